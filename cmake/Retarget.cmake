@@ -1,0 +1,39 @@
+# What every target of the tree shares.
+include(${CMAKE_CURRENT_LIST_DIR}/Floors.cmake)
+
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+# One form of code for the libraries, the module that is made of them, and the programs.
+add_compile_options(-fPIC -Wall -Wextra -Werror)
+
+if(RETARGET_SANITIZE)
+	add_compile_options(-fsanitize=${RETARGET_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
+	add_link_options(-fsanitize=${RETARGET_SANITIZE})
+endif()
+
+find_program(CCACHE ccache)
+if(CCACHE AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
+	set(CMAKE_CXX_COMPILER_LAUNCHER ${CCACHE})
+endif()
+
+# retarget_library(NAME SOURCES ... [PUBLIC ...] [PRIVATE ...]): a static library that is included as "NAME/File.h".
+function(retarget_library name)
+	cmake_parse_arguments(PARSE_ARGV 1 arg "" "" "SOURCES;PUBLIC;PRIVATE")
+	add_library(${name} STATIC ${arg_SOURCES})
+	cmake_path(GET CMAKE_CURRENT_SOURCE_DIR PARENT_PATH wing)
+	target_include_directories(${name} PUBLIC $<BUILD_INTERFACE:${wing}>)
+	target_link_libraries(${name} PUBLIC ${arg_PUBLIC} PRIVATE ${arg_PRIVATE})
+endfunction()
+
+# retarget_test(NAME SOURCES ... LIBRARIES ...): a GoogleTest program; RETARGET_TEST_DATA is the folder tests/data and
+# RETARGET_SOURCE the root of the tree.
+function(retarget_test name)
+	cmake_parse_arguments(PARSE_ARGV 1 arg "" "" "SOURCES;LIBRARIES")
+	add_executable(test_${name} ${arg_SOURCES})
+	target_link_libraries(test_${name} PRIVATE ${arg_LIBRARIES} GTest::gtest_main)
+	target_compile_definitions(test_${name} PRIVATE RETARGET_TEST_DATA="${CMAKE_SOURCE_DIR}/tests/data"
+		RETARGET_SOURCE="${CMAKE_SOURCE_DIR}")
+	add_test(NAME ${name} COMMAND test_${name})
+endfunction()

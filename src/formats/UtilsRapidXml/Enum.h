@@ -1,0 +1,68 @@
+#pragma once
+
+#include <map>
+#include <string>
+#include <vector>
+
+namespace UtilsRapidXml
+{
+
+/// A named text-to-value table.
+class IEnum
+{
+public:
+	virtual ~IEnum() = default;
+	/// The type name, such as "TYPE_DRAW-STYLE".
+	virtual const std::string& GetName() const = 0;
+	/// All texts in ascending order.
+	virtual std::vector<std::string> GetTexts() const = 0;
+};
+
+template <typename T>
+class VEnum final : public IEnum
+{
+public:
+	explicit VEnum(std::string i_Name) : m_Name(std::move(i_Name)) {}
+
+	VEnum& Add(T i_Value, const std::string& i_rText)
+	{
+		m_TextToValue.emplace(i_rText, i_Value);
+		m_ValueToText.emplace(i_Value, i_rText);
+		return *this;
+	}
+
+	bool ToValue(const std::string& i_rText, T& o_rValue) const
+	{
+		const auto it = m_TextToValue.find(i_rText);
+		if (it == m_TextToValue.end())
+			return false;
+		o_rValue = it->second;
+		return true;
+	}
+
+	bool ToText(T i_Value, std::string& o_rText) const
+	{
+		const auto it = m_ValueToText.find(i_Value);
+		if (it == m_ValueToText.end())
+			return false;
+		o_rText = it->second;
+		return true;
+	}
+
+	const std::string& GetName() const override { return m_Name; }
+
+	std::vector<std::string> GetTexts() const override
+	{
+		std::vector<std::string> texts;
+		for (const auto& [rText, value] : m_TextToValue)
+			texts.push_back(rText);
+		return texts;
+	}
+
+private:
+	std::string m_Name;
+	std::map<std::string, T> m_TextToValue;
+	std::map<T, std::string> m_ValueToText;
+};
+
+} // namespace UtilsRapidXml

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "CoreOrlexTypes/SubjectApplicationData.h"
+#include "CoreOrlexTypes/SubjectParametrised.h"
+
+namespace CoreOrlexTypes
+{
+
+/// The pair that a retarget subject's text form holds.
+struct VSubjectRecord
+{
+	VSubjectParametrised m_SubjectParametrised;
+	VSubjectApplicationData m_SubjectApplicationData;
+};
+
+} // namespace CoreOrlexTypes

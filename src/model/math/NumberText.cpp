@@ -1,0 +1,174 @@
+#include "math/NumberText.h"
+
+#include <charconv>
+#include <cmath>
+#include <limits>
+#include <locale.h>
+#include <stdlib.h>
+
+namespace
+{
+
+bool IsSpace(char i_Byte)
+{
+	return i_Byte == ' ' || (i_Byte >= '\t' && i_Byte <= '\r');
+}
+
+bool IsDigit(char i_Byte)
+{
+	return i_Byte >= '0' && i_Byte <= '9';
+}
+
+bool IsHexDigit(char i_Byte)
+{
+	return IsDigit(i_Byte) || (i_Byte >= 'a' && i_Byte <= 'f') || (i_Byte >= 'A' && i_Byte <= 'F');
+}
+
+/// True if the text goes on with the lower-case word in any case.
+bool GoesOnWith(const char* i_pFrom, const char* i_pEnd, std::string_view i_Word)
+{
+	if (std::size_t(i_pEnd - i_pFrom) < i_Word.size())
+		return false;
+	for (std::size_t i = 0; i < i_Word.size(); ++i)
+		if ((i_pFrom[i] | 0x20) != i_Word[i])
+			return false;
+	return true;
+}
+
+template <typename TIsDigit>
+const char* SkipDigits(const char* i_pFrom, const char* i_pEnd, TIsDigit i_IsDigit)
+{
+	while (i_pFrom != i_pEnd && i_IsDigit(*i_pFrom))
+		++i_pFrom;
+	return i_pFrom;
+}
+
+/// The end of digits [. digits] [exponent], or null if there is no digit or an exponent letter stands without digits.
+template <typename TIsDigit>
+const char* EndOfNumber(const char* i_pFrom, const char* i_pEnd, TIsDigit i_IsDigit, char i_ExponentLetter)
+{
+	const char* p = SkipDigits(i_pFrom, i_pEnd, i_IsDigit);
+	std::size_t digits = p - i_pFrom;
+	if (p != i_pEnd && *p == '.')
+	{
+		const char* const pFraction = ++p;
+		p = SkipDigits(p, i_pEnd, i_IsDigit);
+		digits += p - pFraction;
+	}
+	if (digits == 0)
+		return nullptr;
+	if (p != i_pEnd && (*p | 0x20) == i_ExponentLetter)
+	{
+		++p;
+		if (p != i_pEnd && (*p == '+' || *p == '-'))
+			++p;
+		const char* const pExponent = p;
+		p = SkipDigits(p, i_pEnd, IsDigit);
+		if (p == pExponent)
+			return nullptr;
+	}
+	return p;
+}
+
+/// The C library's result for a number beyond the range of a double: an infinity, a subnormal or zero.
+double OutOfRange(const std::string& i_rNumber)
+{
+#ifdef _WIN32
+	static const _locale_t s_Locale = _create_locale(LC_ALL, "C");
+	return _strtod_l(i_rNumber.c_str(), nullptr, s_Locale);
+#else
+	static const locale_t s_Locale = newlocale(LC_ALL_MASK, "C", nullptr);
+	return strtod_l(i_rNumber.c_str(), nullptr, s_Locale);
+#endif
+}
+
+bool AppendNotFinite(std::string& io_rText, double i_Value)
+{
+	if (std::isfinite(i_Value))
+		return false;
+	if (std::signbit(i_Value))
+		io_rText += '-';
+	io_rText += std::isnan(i_Value) ? "1.#IND" : "1.#INF";
+	return true;
+}
+
+} // namespace
+
+std::size_t NumberText::ScanReal(std::string_view i_Text, double& o_rValue)
+{
+	const char* const pBegin = i_Text.data();
+	const char* const pEnd = pBegin + i_Text.size();
+	const char* p = SkipDigits(pBegin, pEnd, IsSpace);
+	bool bNegative = false;
+	if (p != pEnd && (*p == '+' || *p == '-'))
+		bNegative = *p++ == '-';
+
+	if (GoesOnWith(p, pEnd, "nan"))
+	{
+		o_rValue = std::copysign(std::numeric_limits<double>::quiet_NaN(), bNegative ? -1.0 : 1.0);
+		return p + 3 - pBegin;
+	}
+	if (GoesOnWith(p, pEnd, "inf"))
+	{
+		p += 3;
+		if (p != pEnd && (*p | 0x20) == 'i')
+		{
+			if (!GoesOnWith(p, pEnd, "inity"))
+				return 0;
+			p += 5;
+		}
+		o_rValue = bNegative ? -HUGE_VAL : HUGE_VAL;
+		return p - pBegin;
+	}
+
+	const bool bHexadecimal = GoesOnWith(p, pEnd, "0x");
+	const char* const pNumber = bHexadecimal ? p + 2 : p;
+	const char* const pNumberEnd =
+	    bHexadecimal ? EndOfNumber(pNumber, pEnd, IsHexDigit, 'p') : EndOfNumber(pNumber, pEnd, IsDigit, 'e');
+	if (!pNumberEnd)
+		return 0;
+	double value = 0.0;
+	const auto result =
+	    std::from_chars(pNumber, pNumberEnd, value, bHexadecimal ? std::chars_format::hex : std::chars_format::general);
+	if (result.ec == std::errc::result_out_of_range)
+		value = OutOfRange(std::string(p, pNumberEnd));
+	o_rValue = bNegative ? -value : value;
+	return pNumberEnd - pBegin;
+}
+
+bool NumberText::ScanWholeReal(std::string_view i_Text, double& o_rValue)
+{
+	double value = 0.0;
+	const std::size_t read = ScanReal(i_Text, value);
+	if (read == 0 || read != i_Text.size())
+		return false;
+	o_rValue = value;
+	return true;
+}
+
+void NumberText::AppendG17(std::string& io_rText, double i_Value)
+{
+	if (AppendNotFinite(io_rText, i_Value))
+		return;
+	char buffer[32];
+	const auto result = std::to_chars(buffer, buffer + sizeof(buffer), i_Value, std::chars_format::general, 17);
+	io_rText.append(buffer, result.ptr);
+}
+
+std::string NumberText::PrintG17(double i_Value)
+{
+	std::string text;
+	AppendG17(text, i_Value);
+	return text;
+}
+
+std::string NumberText::PrintF(double i_Value)
+{
+	std::string text;
+	if (AppendNotFinite(text, i_Value))
+		return text;
+	char buffer[512];
+	const auto result = std::to_chars(buffer, buffer + sizeof(buffer), i_Value, std::chars_format::fixed, 6);
+	text.assign(buffer, result.ptr);
+	return text;
+}

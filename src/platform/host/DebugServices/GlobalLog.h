@@ -1,0 +1,89 @@
+#pragma once
+
+#include <boost/format.hpp>
+
+#include <atomic>
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace NVX
+{
+
+enum ELogLevel : int
+{
+	ELogError = 2,
+	ELogWarning = 3,
+	ELogInformation = 4,
+	ELogDetail = 6
+};
+
+/// Resolved once by name and kept per call site; lives as long as the process.
+class VLogCategory
+{
+public:
+	explicit VLogCategory(std::string i_Name) : m_Name(std::move(i_Name)) {}
+	const std::string& Name() const { return m_Name; }
+	bool Enabled(int i_Level) const { return i_Level <= m_Level.load(std::memory_order_relaxed); }
+	void SetLevel(int i_Level) { m_Level.store(i_Level, std::memory_order_relaxed); }
+	int Level() const { return m_Level.load(std::memory_order_relaxed); }
+
+private:
+	std::string m_Name;
+	std::atomic<int> m_Level{ELogWarning};
+};
+
+using VLogSink = std::function<void(const VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)>;
+
+/// The host's log: categories by name, and the sinks that receive what passes a category's level. Thread safe.
+class GlobalLog
+{
+public:
+	static VLogCategory& Category(const std::string& i_rName);
+
+	/// For all categories, those made later included.
+	static void SetDefaultLevel(int i_Level);
+
+	/// The sink receives messages for as long as the returned token lives, on the thread that logs.
+	/// While there is no sink, messages go to standard error.
+	[[nodiscard]] static std::shared_ptr<void> AddSink(VLogSink i_Sink);
+};
+
+} // namespace NVX
+
+namespace LoggingDetail
+{
+
+/// Hands a finished message to the sinks.
+void GlobalLogStream(const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage);
+
+/// A message with %1%-style placeholders or printf directives. One that cannot be formatted is told as such at error
+/// level instead, so that logging never raises.
+template <typename... VArguments>
+void Log(const NVX::VLogCategory& i_rCategory, int i_Level, const char* i_pFormat, const VArguments&... i_rArguments)
+{
+	std::string message;
+	try
+	{
+		boost::format format(i_pFormat);
+		(void)(format % ... % i_rArguments);
+		message = format.str();
+	}
+	catch (const std::exception&)
+	{
+		i_Level = NVX::ELogError;
+		message = std::string("Cannot Format Log Message \"") + i_pFormat + "\"";
+	}
+	GlobalLogStream(i_rCategory, i_Level, message);
+}
+
+} // namespace LoggingDetail
+
+/// NVX_LOG("FBXIO", NVX::ELogError, "File %1% not found", path): formats only if the category's level lets it through.
+#define NVX_LOG(i_Category, i_Level, ...)                                                                              \
+	do                                                                                                                 \
+	{                                                                                                                  \
+		static NVX::VLogCategory& s_rLogCategory = NVX::GlobalLog::Category(i_Category);                               \
+		if (s_rLogCategory.Enabled(i_Level))                                                                           \
+			LoggingDetail::Log(s_rLogCategory, i_Level, __VA_ARGS__);                                                  \
+	} while (false)

@@ -1,0 +1,98 @@
+#include "math/NumberText.h"
+
+#include <gtest/gtest.h>
+
+#include <bit>
+#include <cmath>
+#include <cstdio>
+#include <limits>
+#include <random>
+
+namespace
+{
+
+/// What the C library reads: the oracle for the scanner. Run it only in the C numeric locale.
+/// The standard calls an exponent letter or a hexadecimal mark without digits a matching failure; glibc takes the
+/// number before it. This is told apart by what glibc's last byte is.
+std::size_t LibraryScan(const std::string& i_rText, double& o_rValue)
+{
+	int read = 0;
+	const double before = o_rValue;
+	if (std::sscanf(i_rText.c_str(), "%lf%n", &o_rValue, &read) != 1)
+		return 0;
+	const std::string taken = i_rText.substr(0, read);
+	const bool bHexadecimal = taken.find_first_of("xX") != std::string::npos;
+	const bool bHasDigit = taken.find_first_of("0123456789abcdefABCDEF", bHexadecimal ? taken.find_first_of("xX") : 0)
+	    != std::string::npos;
+	const bool bWord = taken.find_first_of("nN") != std::string::npos;
+	if (bWord || (bHasDigit && taken.find_last_of(bHexadecimal ? "pP+-" : "eE+-") != taken.size() - 1))
+		return std::size_t(read);
+	o_rValue = before;
+	return 0;
+}
+
+void ExpectSameScan(const std::string& i_rText)
+{
+	double expected = 7.0;
+	double value = 7.0;
+	const std::size_t expectedRead = LibraryScan(i_rText, expected);
+	EXPECT_EQ(NumberText::ScanReal(i_rText, value), expectedRead) << '"' << i_rText << '"';
+	if (std::isnan(expected))
+		EXPECT_TRUE(std::isnan(value)) << '"' << i_rText << '"';
+	else
+		EXPECT_EQ(std::bit_cast<std::uint64_t>(value), std::bit_cast<std::uint64_t>(expected)) << '"' << i_rText << '"';
+}
+
+TEST(NumberText, ScansWhatTheLibraryScans)
+{
+	for (const char* pText :
+	    {"1", " \t\n\v\f\r1", "+1", "-1", "+-1", "", " ", ".", "-.", "1.", ".5", "1.5.2", "1e5", "1e+5", "2e", "2e+",
+	        "2ex", "1e400", "-1e400", "1e-400", "4e-320", "1,5", "0x10", "0x", "0x.8p1", "0x1p-1080", "0x1p5000",
+	        "0x1p", "inf", "INFINITY", "infinit", "infx", "nan", "-NaN", "na", "1e5000000000", "00012", "-0"})
+		ExpectSameScan(pText);
+}
+
+TEST(NumberText, ScansRandomTextAsTheLibraryDoes)
+{
+	std::mt19937 generator(20);
+	const std::string alphabet = "0123456789..ee+-xXpPaf inI";
+	for (int round = 0; round < 200000; ++round)
+	{
+		std::string text(generator() % 9, ' ');
+		for (char& rByte : text)
+			rByte = alphabet[generator() % alphabet.size()];
+		ExpectSameScan(text);
+	}
+}
+
+TEST(NumberText, PrintsAsPrintf)
+{
+	std::mt19937_64 generator(21);
+	for (int round = 0; round < 100000; ++round)
+	{
+		const double value =
+		    round % 2 ? std::bit_cast<double>(generator()) : std::ldexp(double(generator() % 2000001) - 1e6, -10);
+		if (!std::isfinite(value))
+			continue;
+		char buffer[512];
+		std::snprintf(buffer, sizeof(buffer), "%.17g", value);
+		ASSERT_EQ(NumberText::PrintG17(value), buffer);
+		double back = 0.0;
+		ASSERT_TRUE(NumberText::ScanWholeReal(buffer, back));
+		ASSERT_EQ(back, value);
+		std::snprintf(buffer, sizeof(buffer), "%f", value);
+		ASSERT_EQ(NumberText::PrintF(value), buffer);
+	}
+}
+
+TEST(NumberText, PrintsWhatIsNotFiniteAsExpressionsReadIt)
+{
+	const double infinity = std::numeric_limits<double>::infinity();
+	const double notANumber = std::numeric_limits<double>::quiet_NaN();
+	EXPECT_EQ(NumberText::PrintG17(infinity), "1.#INF");
+	EXPECT_EQ(NumberText::PrintF(-infinity), "-1.#INF");
+	EXPECT_EQ(NumberText::PrintG17(notANumber), "1.#IND");
+	EXPECT_EQ(NumberText::PrintF(std::copysign(notANumber, -1.0)), "-1.#IND");
+}
+
+} // namespace
