@@ -1,0 +1,25 @@
+# Sourced by the commands. ensure_packages PURPOSE...: installs the packages of these purposes that are missing.
+# build PRESET [TARGET...]: configures once, then builds.
+
+say() { printf '\n== %s\n' "$*"; }
+
+ensure_packages() {
+	local wanted missing=() package
+	wanted=$(for purpose in "$@"; do awk -v p="$purpose" '$1 == p { for (i = 2; i <= NF; ++i) print $i }' setup/packages; done)
+	for package in $wanted; do
+		[ "$(dpkg-query -W -f='${db:Status-Status}' "$package" 2>/dev/null)" = installed ] || missing+=("$package")
+	done
+	[ ${#missing[@]} -eq 0 ] && return
+	say "Installing ${#missing[@]} Debian packages: ${missing[*]}"
+	local root=()
+	[ "$(id -u)" -eq 0 ] || root=(sudo)
+	"${root[@]}" apt-get update -qq
+	"${root[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null
+}
+
+build() {
+	local preset=$1
+	shift
+	[ -f "build/$preset/build.ninja" ] || cmake --preset "$preset" >/dev/null
+	cmake --build --preset "$preset" ${1:+--target "$@"}
+}
