@@ -1,5 +1,7 @@
 # What every target of the tree shares.
 include(${CMAKE_CURRENT_LIST_DIR}/Floors.cmake)
+include(CMakePackageConfigHelpers)
+include(GNUInstallDirs)
 
 set(CMAKE_CXX_STANDARD 20)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
@@ -25,6 +27,14 @@ function(retarget_library name)
 	cmake_path(GET CMAKE_CURRENT_SOURCE_DIR PARENT_PATH wing)
 	target_include_directories(${name} PUBLIC $<BUILD_INTERFACE:${wing}>)
 	target_link_libraries(${name} PUBLIC ${arg_PUBLIC} PRIVATE ${arg_PRIVATE})
+	retarget_install(${name} ${CMAKE_CURRENT_SOURCE_DIR})
+endfunction()
+
+# retarget_install(NAME FOLDER): the library and the headers of a folder go into the installed package.
+function(retarget_install name folder)
+	target_include_directories(${name} PUBLIC $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup>)
+	install(TARGETS ${name} EXPORT RetargetSetup ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR}/RetargetSetup)
+	install(DIRECTORY ${folder} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup FILES_MATCHING PATTERN "*.h")
 endfunction()
 
 # retarget_test(NAME SOURCES ... LIBRARIES ...): a GoogleTest program; RETARGET_TEST_DATA is the folder tests/data and
@@ -36,4 +46,14 @@ function(retarget_test name)
 	target_compile_definitions(test_${name} PRIVATE RETARGET_TEST_DATA="${CMAKE_SOURCE_DIR}/tests/data"
 		RETARGET_SOURCE="${CMAKE_SOURCE_DIR}")
 	add_test(NAME ${name} COMMAND test_${name})
+endfunction()
+
+# retarget_package(): the CMake package config of all that was installed, so that find_package(RetargetSetup) gives
+# RetargetSetup::<Library>.
+function(retarget_package)
+	set(folder ${CMAKE_INSTALL_LIBDIR}/cmake/RetargetSetup)
+	install(EXPORT RetargetSetup NAMESPACE RetargetSetup:: DESTINATION ${folder})
+	write_basic_package_version_file(${PROJECT_BINARY_DIR}/RetargetSetup-config-version.cmake COMPATIBILITY SameMinorVersion)
+	install(FILES ${PROJECT_BINARY_DIR}/RetargetSetup-config-version.cmake ${PROJECT_SOURCE_DIR}/cmake/RetargetSetup-config.cmake
+		DESTINATION ${folder})
 endfunction()

@@ -1,0 +1,5 @@
+# find_package(RetargetSetup): targets RetargetSetup::<Library>, included as "Library/File.h".
+include(CMakeFindDependencyMacro)
+find_dependency(Boost COMPONENTS filesystem regex thread system)
+find_dependency(Qt5 COMPONENTS Core Gui Qml)
+include(${CMAKE_CURRENT_LIST_DIR}/RetargetSetup.cmake)
