@@ -52,8 +52,8 @@ endfunction()
 # RetargetSetup::<Library>.
 function(retarget_package)
 	set(folder ${CMAKE_INSTALL_LIBDIR}/cmake/RetargetSetup)
-	install(EXPORT RetargetSetup NAMESPACE RetargetSetup:: DESTINATION ${folder})
-	write_basic_package_version_file(${PROJECT_BINARY_DIR}/RetargetSetup-config-version.cmake COMPATIBILITY SameMinorVersion)
-	install(FILES ${PROJECT_BINARY_DIR}/RetargetSetup-config-version.cmake ${PROJECT_SOURCE_DIR}/cmake/RetargetSetup-config.cmake
+	install(EXPORT RetargetSetup FILE RetargetSetupTargets.cmake NAMESPACE RetargetSetup:: DESTINATION ${folder})
+	write_basic_package_version_file(${PROJECT_BINARY_DIR}/RetargetSetupConfigVersion.cmake COMPATIBILITY SameMinorVersion)
+	install(FILES ${PROJECT_BINARY_DIR}/RetargetSetupConfigVersion.cmake ${PROJECT_SOURCE_DIR}/cmake/RetargetSetupConfig.cmake
 		DESTINATION ${folder})
 endfunction()

@@ -2,4 +2,4 @@
 include(CMakeFindDependencyMacro)
 find_dependency(Boost COMPONENTS filesystem regex thread system)
 find_dependency(Qt5 COMPONENTS Core Gui Qml)
-include(${CMAKE_CURRENT_LIST_DIR}/RetargetSetup.cmake)
+include(${CMAKE_CURRENT_LIST_DIR}/RetargetSetupTargets.cmake)
