@@ -1,0 +1,20 @@
+#pragma once
+
+#include <cstddef>
+#include <string_view>
+
+namespace UtilsRapidXml
+{
+
+/// True for the code points that XML 1.0 can hold, be it as such or as a character reference (production 2, Char).
+constexpr bool IsXmlCharacter(char32_t i_Code)
+{
+	return (i_Code >= 0x20 && i_Code <= 0xD7FF) || i_Code == '\t' || i_Code == '\n' || i_Code == '\r'
+	    || (i_Code >= 0xE000 && i_Code <= 0xFFFD) || (i_Code >= 0x10000 && i_Code <= 0x10FFFF);
+}
+
+/// @return the place of the first byte that is no well-formed UTF-8 (overlong forms and surrogates included) or begins
+/// a character that XML cannot hold, npos if there is none.
+std::size_t FindBrokenCharacter(std::string_view i_Text);
+
+} // namespace UtilsRapidXml

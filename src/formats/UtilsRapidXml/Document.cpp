@@ -1,0 +1,152 @@
+#include "UtilsRapidXml/Document.h"
+
+#include "UtilsRapidXml/Characters.h"
+#include "UtilsRapidXml/TextCheck.h"
+
+#include <rapidxml/rapidxml.hpp>
+#include <rapidxml/rapidxml_print.hpp>
+
+#include <cstring>
+
+namespace
+{
+
+/// The printer writes line ends and tabs as they are. In the nodes of a document that is built they stand as bytes that
+/// no text may have, and become references after printing.
+constexpr std::string_view c_Referred = "\t\n\r";
+constexpr char c_MarkOfFirst = 1;
+
+/// Counts what is printed, so that the text is allocated once.
+struct VCounter
+{
+	VCounter& operator*() { return *this; }
+	VCounter& operator++() { return *this; }
+	VCounter& operator++(int) { return *this; }
+	void operator=(char) { ++m_Count; }
+	std::size_t m_Count = 0;
+};
+
+std::string ExpandMarks(const std::string& i_rText)
+{
+	std::string text;
+	text.reserve(i_rText.size() + i_rText.size() / 8);
+	for (const char byte : i_rText)
+		if (byte >= c_MarkOfFirst && byte < c_MarkOfFirst + char(c_Referred.size()))
+			text += "&#" + std::to_string(int(c_Referred[byte - c_MarkOfFirst])) + ';';
+		else
+			text += byte;
+	return text;
+}
+
+} // namespace
+
+namespace UtilsRapidXml
+{
+
+struct VDocument::VContent
+{
+	/// A copy in the document's memory, without a zero at its end.
+	char* Copy(std::string_view i_Text)
+	{
+		if (i_Text.empty())
+			return m_Empty;
+		char* const pCopy = m_Document.allocate_string(nullptr, i_Text.size());
+		std::memcpy(pCopy, i_Text.data(), i_Text.size());
+		return pCopy;
+	}
+
+	VXmlNode* Append(VXmlNode* i_pParent, rapidxml::node_type i_Type, std::string_view i_Name)
+	{
+		VXmlNode* const pNode = m_Document.allocate_node(i_Type);
+		pNode->name(Copy(i_Name), i_Name.size());
+		i_pParent->append_node(pNode);
+		return pNode;
+	}
+
+	char m_Empty[1] = {0};
+	std::string m_Text;
+	bool m_bMarks = false;
+	rapidxml::xml_document<char> m_Document;
+};
+
+VDocument::VDocument() : m_pContent(std::make_unique<VContent>()) {}
+
+VDocument::~VDocument() = default;
+
+bool VDocument::Parse(std::string i_Text, std::string& o_rError)
+{
+	m_pContent = std::make_unique<VContent>();
+	if (!CheckText(i_Text, o_rError))
+		return false;
+	m_pContent->m_Text = std::move(i_Text);
+	try
+	{
+		// Elements of these documents have no content but elements; all text is in attributes.
+		constexpr int c_Flags =
+		    rapidxml::parse_validate_closing_tags | rapidxml::parse_no_data_nodes | rapidxml::parse_no_element_values;
+		m_pContent->m_Document.parse<c_Flags>(m_pContent->m_Text.data());
+		return true;
+	}
+	catch (const rapidxml::parse_error& rError)
+	{
+		o_rError = rError.what();
+	}
+	m_pContent = std::make_unique<VContent>();
+	return false;
+}
+
+VXmlNode* VDocument::GetRoot()
+{
+	return &m_pContent->m_Document;
+}
+
+void VDocument::AppendDeclaration()
+{
+	VXmlNode* const pDeclaration = m_pContent->Append(GetRoot(), rapidxml::node_declaration, {});
+	AppendAttribute(pDeclaration, "version", "1.0");
+	AppendAttribute(pDeclaration, "encoding", "UTF-8");
+	AppendAttribute(pDeclaration, "standalone", "no");
+}
+
+void VDocument::AppendProcessingInstruction(std::string_view i_Target, std::string_view i_Text)
+{
+	VXmlNode* const pNode = m_pContent->Append(GetRoot(), rapidxml::node_pi, i_Target);
+	pNode->value(m_pContent->Copy(i_Text), i_Text.size());
+}
+
+VXmlNode* VDocument::AppendElement(VXmlNode* i_pParent, std::string_view i_Name)
+{
+	return m_pContent->Append(i_pParent, rapidxml::node_element, i_Name);
+}
+
+bool VDocument::AppendAttribute(VXmlNode* i_pElement, std::string_view i_Name, std::string_view i_Text)
+{
+	if (FindBrokenCharacter(i_Text) != std::string_view::npos)
+		return false;
+	char* const pText = m_pContent->Copy(i_Text);
+	for (std::size_t i = 0; i < i_Text.size(); ++i)
+		if (static_cast<unsigned char>(i_Text[i]) < ' ')
+		{
+			pText[i] = c_MarkOfFirst + char(c_Referred.find(i_Text[i]));
+			m_pContent->m_bMarks = true;
+		}
+	rapidxml::xml_attribute<char>* const pAttribute = m_pContent->m_Document.allocate_attribute();
+	pAttribute->name(m_pContent->Copy(i_Name), i_Name.size());
+	pAttribute->value(pText, i_Text.size());
+	i_pElement->append_attribute(pAttribute);
+	return true;
+}
+
+void VDocument::SetText(VXmlNode* i_pElement, std::string_view i_Text)
+{
+	i_pElement->value(m_pContent->Copy(i_Text), i_Text.size());
+}
+
+std::string VDocument::Print() const
+{
+	std::string text(rapidxml::print(VCounter(), m_pContent->m_Document).m_Count, '\0');
+	rapidxml::print(text.data(), m_pContent->m_Document);
+	return m_pContent->m_bMarks ? ExpandMarks(text) : text;
+}
+
+} // namespace UtilsRapidXml

@@ -1,0 +1,185 @@
+#include "UtilsRapidXml/ReaderNode.h"
+
+#include <rapidxml/rapidxml.hpp>
+
+#include <algorithm>
+
+namespace UtilsRapidXml
+{
+namespace
+{
+
+template <typename T>
+std::string_view Name(const T* i_pItem)
+{
+	return {i_pItem->name(), i_pItem->name_size()};
+}
+
+/// "/" and the document node's name, which is empty, then "/" and a name for each element on the way.
+std::string Path(const VXmlNode* i_pElement)
+{
+	std::vector<std::string_view> names;
+	std::size_t size = 1;
+	for (; i_pElement->parent(); i_pElement = i_pElement->parent())
+	{
+		names.push_back(Name(i_pElement));
+		size += 1 + names.back().size();
+	}
+	std::string path;
+	path.reserve(size);
+	path += '/';
+	for (auto name = names.rbegin(); name != names.rend(); ++name)
+		(path += '/') += *name;
+	return path;
+}
+
+bool Contains(const std::vector<std::string_view>& i_rNames, std::string_view i_Name)
+{
+	return std::find(i_rNames.begin(), i_rNames.end(), i_Name) != i_rNames.end();
+}
+
+} // namespace
+
+VReaderNode::VReaderNode(VDocument& i_rDocument, bool i_bStrictOrder)
+    : VReaderNode(i_rDocument.GetRoot(), std::make_shared<VGlobalInfo>())
+{
+	m_pGlobal->m_bStrictOrder = i_bStrictOrder;
+}
+
+VReaderNode::VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pGlobal)
+    : m_pElement(i_pElement), m_Name(UtilsRapidXml::Name(i_pElement)), m_pGlobal(std::move(i_pGlobal))
+{
+}
+
+VReaderNode::~VReaderNode()
+{
+	std::set<std::string_view> told;
+	for (const VXmlNode* pChild = m_pElement->first_node(); pChild; pChild = pChild->next_sibling())
+	{
+		const std::string_view name = UtilsRapidXml::Name(pChild);
+		if (!Contains(m_RecognisedChildren, name) && told.insert(name).second)
+			m_pGlobal->m_Warnings.Add("Ignoring unrecognised element type: %1%", [&] { return Path(pChild); });
+	}
+	for (const auto* pAttribute = m_pElement->first_attribute(); pAttribute; pAttribute = pAttribute->next_attribute())
+		if (std::find(m_RecognisedAttributes.begin(), m_RecognisedAttributes.end(), pAttribute->name())
+		    == m_RecognisedAttributes.end())
+			m_pGlobal->m_Warnings.Add("Ignoring unrecognised attribute: %1%",
+			    [&] { return (Path(m_pElement) += '/') += UtilsRapidXml::Name(pAttribute); });
+}
+
+void VReaderNode::DeclareElement(std::string_view i_Name, std::string_view, std::uint32_t i_MinimumCount,
+    std::uint32_t i_MaximumCount, VVersion i_Minimum, VVersion i_Maximum)
+{
+	m_Pending.push_back({std::string(i_Name), i_MinimumCount, i_MaximumCount, i_Minimum, i_Maximum});
+}
+
+void VReaderNode::Match(
+    const VDeclaration& i_rDeclaration, bool i_bChoice, std::string& io_rChosen, std::vector<VMatch>& io_rMatches)
+{
+	VMessages& rErrors = m_pGlobal->m_Errors;
+	const auto path = [this] { return Path(m_pElement); };
+	std::uint32_t count = 0;
+	std::size_t position = 0;
+	for (VXmlNode* pChild = m_pElement->first_node(); pChild; pChild = pChild->next_sibling(), ++position)
+	{
+		const std::string_view name = UtilsRapidXml::Name(pChild);
+		if (name != i_rDeclaration.m_Name)
+			continue;
+		if (!Contains(m_RecognisedChildren, name))
+			m_RecognisedChildren.push_back(name);
+		const auto childPath = [pChild] { return Path(pChild); };
+		if (!InRange(GetVersion(), i_rDeclaration.m_Minimum, i_rDeclaration.m_Maximum))
+		{
+			m_pGlobal->m_Warnings.Add(
+			    "Ignoring %1% element. Not supported in files with version %2%", childPath, ToText(GetVersion()));
+			continue;
+		}
+		if (m_pGlobal->m_bStrictOrder && position < m_HighestPosition)
+		{
+			rErrors.Add("%1% element did not appear in correct element sequence", childPath);
+			continue;
+		}
+		m_HighestPosition = position;
+		if (i_bChoice && !io_rChosen.empty())
+		{
+			rErrors.Add("%1% element cannot have both a %2% and a %3% child element", path, io_rChosen, name);
+			continue;
+		}
+		if (i_bChoice)
+			io_rChosen = name;
+		else if (++count > i_rDeclaration.m_MaximumCount && i_rDeclaration.m_MaximumCount >= 1)
+		{
+			rErrors.Add(
+			    "%1% element must have a maximum of %2% %3% child elements", path, i_rDeclaration.m_MaximumCount, name);
+			continue;
+		}
+		io_rMatches.push_back({position, pChild});
+	}
+	if (!i_bChoice && count < i_rDeclaration.m_MinimumCount)
+		rErrors.Add("%1% element must have a minimum of %2% %3% child elements", path, i_rDeclaration.m_MinimumCount,
+		    i_rDeclaration.m_Name);
+}
+
+void VReaderNode::ProcessElements(const std::function<void(INode&)>& i_rCallback, bool i_bChoice)
+{
+	if (m_Pending.empty())
+		return;
+	std::string chosen;
+	std::vector<VMatch> matches;
+	for (const VDeclaration& rDeclaration : m_Pending)
+		Match(rDeclaration, i_bChoice, chosen, matches);
+	if (i_bChoice && chosen.empty())
+	{
+		std::string names;
+		for (const VDeclaration& rDeclaration : m_Pending)
+			(names += ' ') += rDeclaration.m_Name;
+		m_pGlobal->m_Errors.Add(
+		    "%1% element must have a one of the following child elements:%2%", [this] { return Path(m_pElement); },
+		    names);
+	}
+	m_Pending.clear();
+	// Each declaration's matches stand in order already.
+	std::stable_sort(matches.begin(), matches.end(),
+	    [](const VMatch& i_rLeft, const VMatch& i_rRight) { return i_rLeft.m_Position < i_rRight.m_Position; });
+	for (const VMatch& rMatch : matches)
+	{
+		VReaderNode child(rMatch.m_pElement, m_pGlobal);
+		i_rCallback(child);
+	}
+}
+
+bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string& o_rText, std::string_view,
+    std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum, VVersion i_Maximum)
+{
+	const auto* pAttribute = m_pElement->first_attribute();
+	while (pAttribute && UtilsRapidXml::Name(pAttribute) != i_Name)
+		pAttribute = pAttribute->next_attribute();
+	if (pAttribute)
+		m_RecognisedAttributes.push_back(pAttribute->name());
+
+	if (!InRange(GetVersion(), i_Minimum, i_Maximum))
+	{
+		if (pAttribute)
+			m_pGlobal->m_Warnings.Add("Ignoring %1% attribute in %2% element. Not supported in files with version %3%",
+			    i_Name, m_Name, ToText(GetVersion()));
+		return false;
+	}
+	if (!pAttribute)
+	{
+		if (i_bRequired)
+			m_pGlobal->m_Errors.Add("%1% element missing required attribute %2%", m_Name, i_Name);
+		return false;
+	}
+	const std::string_view value(pAttribute->value(), pAttribute->value_size());
+	if (i_SchemaType == "xsd:ID")
+	{
+		if (!m_pGlobal->m_Ids.insert(value).second)
+			m_pGlobal->m_Warnings.Add("File contains duplicate ID : %1% ", value);
+	}
+	else if (i_SchemaType == "xsd:IDREF" && !m_pGlobal->m_Ids.contains(value))
+		m_pGlobal->m_Warnings.Add("File contains unknown IDREF : %1% ", value);
+	o_rText = value;
+	return true;
+}
+
+} // namespace UtilsRapidXml

@@ -1,0 +1,86 @@
+#pragma once
+
+#include "UtilsRapidXml/Document.h"
+#include "UtilsRapidXml/Messages.h"
+#include "UtilsRapidXml/Node.h"
+
+#include <memory>
+#include <set>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace UtilsRapidXml
+{
+
+/// Reads a document through format functions. What they do not ask for is told as a warning when the node goes, so
+/// that a later version's additions are passed over with a word. Nodes live for the length of one callback, and the
+/// document must outlive them. Nothing is thrown for what a file holds.
+class VReaderNode final : public INode
+{
+public:
+	/// Shared by all nodes of a document; what the owner reads after the walk.
+	struct VGlobalInfo
+	{
+		VVersion m_Version;
+		VMessages m_Errors;
+		VMessages m_Warnings;
+		bool m_bStrictOrder = false;
+		/// The values of all xsd:ID attributes read so far; they point into the document.
+		std::set<std::string_view> m_Ids;
+	};
+
+	/// The node above the document's elements. With strict order children must stand in the order of declaration.
+	VReaderNode(VDocument& i_rDocument, bool i_bStrictOrder);
+	~VReaderNode() override;
+	VReaderNode(const VReaderNode&) = delete;
+	VReaderNode& operator=(const VReaderNode&) = delete;
+
+	const std::shared_ptr<VGlobalInfo>& GetGlobalInfo() const { return m_pGlobal; }
+
+	const std::string& GetName() const override { return m_Name; }
+	void SetVersion(VVersion i_Version) override { m_pGlobal->m_Version = i_Version; }
+	VVersion GetVersion() const override { return m_pGlobal->m_Version; }
+	void DeclareEnum(const IEnum&) override {}
+	void DeclareElement(std::string_view i_Name, std::string_view i_Doc, std::uint32_t i_MinimumCount,
+	    std::uint32_t i_MaximumCount, VVersion i_Minimum = {}, VVersion i_Maximum = {}) override;
+	void ProcessElements(const std::function<void(INode&)>& i_rCallback, bool i_bChoice = false) override;
+	bool ProcessAttribute(std::string_view i_Name, std::string& o_rText, std::string_view i_Doc,
+	    std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum = {}, VVersion i_Maximum = {}) override;
+	void AddError(const std::string& i_rText) override { m_pGlobal->m_Errors.Add(i_rText); }
+	void AddWarning(const std::string& i_rText) override { m_pGlobal->m_Warnings.Add(i_rText); }
+	std::size_t GetErrorCount() const override { return m_pGlobal->m_Errors.GetCount(); }
+
+private:
+	struct VDeclaration
+	{
+		std::string m_Name;
+		std::uint32_t m_MinimumCount;
+		std::uint32_t m_MaximumCount;
+		VVersion m_Minimum;
+		VVersion m_Maximum;
+	};
+
+	struct VMatch
+	{
+		std::size_t m_Position;
+		VXmlNode* m_pElement;
+	};
+
+	VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pGlobal);
+
+	void Match(
+	    const VDeclaration& i_rDeclaration, bool i_bChoice, std::string& io_rChosen, std::vector<VMatch>& io_rMatches);
+
+	VXmlNode* m_pElement;
+	std::string m_Name;
+	std::shared_ptr<VGlobalInfo> m_pGlobal;
+	std::vector<VDeclaration> m_Pending;
+	std::size_t m_HighestPosition = 0;
+	/// Names of children that stand in the file and were declared or already told of; they point into the document.
+	std::vector<std::string_view> m_RecognisedChildren;
+	/// Where the names of the attributes begin that were asked for: no two attributes of an element have one name.
+	std::vector<const char*> m_RecognisedAttributes;
+};
+
+} // namespace UtilsRapidXml

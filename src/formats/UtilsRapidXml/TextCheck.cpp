@@ -1,0 +1,287 @@
+#include "UtilsRapidXml/TextCheck.h"
+
+#include "UtilsRapidXml/Characters.h"
+#include "UtilsRapidXml/Limits.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cstring>
+#include <string_view>
+#include <vector>
+
+namespace
+{
+
+using namespace UtilsRapidXml;
+
+/// What the nodes of a document take in memory.
+constexpr std::size_t c_ElementBytes = 96;
+constexpr std::size_t c_AttributeBytes = 56;
+
+bool IsSpace(char i_Byte)
+{
+	return i_Byte == ' ' || i_Byte == '\t' || i_Byte == '\n' || i_Byte == '\r';
+}
+
+bool StartsName(char i_Byte)
+{
+	const unsigned char lower = i_Byte | 0x20;
+	return (lower >= 'a' && lower <= 'z') || i_Byte == '_' || i_Byte == ':' || (i_Byte & 0x80);
+}
+
+bool ContinuesName(char i_Byte)
+{
+	return StartsName(i_Byte) || (i_Byte >= '0' && i_Byte <= '9') || i_Byte == '-' || i_Byte == '.';
+}
+
+class VTextCheck
+{
+public:
+	explicit VTextCheck(std::string& io_rText) : m_rText(io_rText), m_p(io_rText.data()), m_pEnd(m_p + io_rText.size())
+	{
+	}
+
+	bool Run();
+	std::string Error() const;
+
+private:
+	bool Fail(const char* i_pAt, std::string i_Text)
+	{
+		m_pAt = i_pAt;
+		m_Error = std::move(i_Text);
+		return false;
+	}
+
+	void SkipSpace()
+	{
+		while (m_p != m_pEnd && IsSpace(*m_p))
+			++m_p;
+	}
+
+	bool Take(std::string_view i_Text)
+	{
+		if (!std::string_view(m_p, m_pEnd - m_p).starts_with(i_Text))
+			return false;
+		m_p += i_Text.size();
+		return true;
+	}
+
+	std::string_view TakeName()
+	{
+		const char* const pBegin = m_p;
+		if (m_p != m_pEnd && StartsName(*m_p))
+			while (m_p != m_pEnd && ContinuesName(*m_p))
+				++m_p;
+		return {pBegin, m_p};
+	}
+
+	bool SkipPast(std::string_view i_End, const char* i_pWhat)
+	{
+		const std::size_t found = std::string_view(m_p, m_pEnd - m_p).find(i_End);
+		if (found == std::string_view::npos)
+			return Fail(m_p, std::string(i_pWhat) + " does not end");
+		m_p += found + i_End.size();
+		return true;
+	}
+
+	bool Markup();
+	bool Opening();
+	bool Closing();
+	bool Attribute();
+	bool DuplicateAttribute();
+	bool References(const char* i_pBegin, const char* i_pEnd);
+
+	std::string& m_rText;
+	char* m_p;
+	char* const m_pEnd;
+	std::vector<std::string_view> m_Open;
+	std::vector<std::string_view> m_Attributes;
+	std::size_t m_NodeBytes = 0;
+	/// Line ends that were turned into blanks before the place of the error.
+	std::size_t m_LineEndsReplaced = 0;
+	const char* m_pAt = nullptr;
+	std::string m_Error;
+};
+
+bool VTextCheck::Run()
+{
+	const std::size_t broken = FindBrokenCharacter(m_rText);
+	if (broken != std::string::npos)
+		return Fail(
+		    m_p + broken, m_rText[broken] == 0 ? "zero byte" : "byte that is no valid UTF-8 or no character of XML");
+	Take("\xEF\xBB\xBF");
+	while (m_p != m_pEnd)
+	{
+		char* const pText = m_p;
+		char* const pMarkup = static_cast<char*>(std::memchr(m_p, '<', m_pEnd - m_p));
+		m_p = pMarkup ? pMarkup : m_pEnd;
+		if (m_Open.empty())
+		{
+			const char* const pStray = std::find_if_not(pText, m_p, IsSpace);
+			if (pStray != m_p)
+				return Fail(pStray, "text outside of any element");
+		}
+		else if (!References(pText, m_p))
+			return false;
+		if (m_p != m_pEnd && !Markup())
+			return false;
+		if (m_NodeBytes + m_rText.size() > c_MaximumDocumentBytes)
+			return Fail(m_p, "too many elements and attributes");
+	}
+	return m_Open.empty() || Fail(m_p, "element " + std::string(m_Open.back()) + " is not closed");
+}
+
+bool VTextCheck::Markup()
+{
+	if (Take("</"))
+		return Closing();
+	if (Take("<?"))
+		return SkipPast("?>", "processing instruction");
+	if (Take("<!--"))
+		return SkipPast("-->", "comment");
+	if (Take("<![CDATA["))
+		return SkipPast("]]>", "character data");
+	if (Take("<!DOCTYPE"))
+	{
+		const std::size_t stop = std::string_view(m_p, m_pEnd - m_p).find_first_of("[>");
+		if (m_p == m_pEnd || !IsSpace(*m_p) || stop == std::string_view::npos || m_p[stop] == '[')
+			return Fail(m_p, "document type that is broken or has an internal subset");
+		m_p += stop + 1;
+		return true;
+	}
+	++m_p;
+	return Opening();
+}
+
+bool VTextCheck::Opening()
+{
+	const std::string_view name = TakeName();
+	if (name.empty())
+		return Fail(m_p, "element without a name");
+	m_NodeBytes += c_ElementBytes;
+	m_Attributes.clear();
+	SkipSpace();
+	while (m_p != m_pEnd && *m_p != '>' && *m_p != '/')
+		if (!Attribute())
+			return false;
+	if (DuplicateAttribute())
+		return false;
+	if (Take("/>"))
+		return true;
+	if (!Take(">"))
+		return Fail(m_p, "tag of element " + std::string(name) + " does not end");
+	m_Open.push_back(name);
+	return m_Open.size() <= c_MaximumDepth
+	    || Fail(m_p, "elements are nested deeper than " + std::to_string(c_MaximumDepth));
+}
+
+bool VTextCheck::Closing()
+{
+	const char* const pAt = m_p;
+	const std::string_view name = TakeName();
+	SkipSpace();
+	if (m_Open.empty() || name != m_Open.back())
+		return Fail(pAt, "closing tag " + std::string(name) + " does not match");
+	if (!Take(">"))
+		return Fail(m_p, "closing tag " + std::string(name) + " does not end");
+	m_Open.pop_back();
+	return true;
+}
+
+bool VTextCheck::Attribute()
+{
+	const std::string_view name = TakeName();
+	if (name.empty())
+		return Fail(m_p, "attribute without a name");
+	m_Attributes.push_back(name);
+	m_NodeBytes += c_AttributeBytes;
+	SkipSpace();
+	if (!Take("="))
+		return Fail(m_p, "attribute " + std::string(name) + " has no value");
+	SkipSpace();
+	if (m_p == m_pEnd || (*m_p != '"' && *m_p != '\''))
+		return Fail(m_p, "value of attribute " + std::string(name) + " is not quoted");
+	const char quote = *m_p++;
+	char* const pBegin = m_p;
+	m_p = static_cast<char*>(std::memchr(m_p, quote, m_pEnd - m_p));
+	if (!m_p)
+		return Fail(pBegin, "value of attribute " + std::string(name) + " does not end");
+	if (!References(pBegin, m_p))
+		return false;
+	m_LineEndsReplaced += std::count(pBegin, m_p, '\n');
+	for (char* p = pBegin; p != m_p; ++p)
+		*p = IsSpace(*p) ? ' ' : *p;
+	++m_p;
+	SkipSpace();
+	return true;
+}
+
+/// True, with the error set, if two attributes of the element in hand have one name.
+bool VTextCheck::DuplicateAttribute()
+{
+	std::vector<std::string_view>& rNames = m_Attributes;
+	constexpr std::size_t c_Few = 24;
+	const char* pTwice = nullptr;
+	std::size_t length = 0;
+	const auto note = [&](std::string_view i_Name)
+	{
+		pTwice = i_Name.data();
+		length = i_Name.size();
+	};
+	if (rNames.size() <= c_Few)
+	{
+		for (std::size_t i = 1; i < rNames.size() && !pTwice; ++i)
+			if (std::find(rNames.begin(), rNames.begin() + i, rNames[i]) != rNames.begin() + i)
+				note(rNames[i]);
+	}
+	else
+	{
+		std::sort(rNames.begin(), rNames.end());
+		const auto twice = std::adjacent_find(rNames.begin(), rNames.end());
+		if (twice != rNames.end())
+			note(*twice);
+	}
+	return pTwice && !Fail(pTwice, "attribute " + std::string(pTwice, length) + " stands twice");
+}
+
+bool VTextCheck::References(const char* i_pBegin, const char* i_pEnd)
+{
+	const char* p = i_pBegin;
+	while (p != i_pEnd && (p = static_cast<const char*>(std::memchr(p, '&', i_pEnd - p))))
+	{
+		const char* const pAt = p++;
+		if (p == i_pEnd || *p != '#')
+			continue;
+		const bool bHexadecimal = ++p != i_pEnd && *p == 'x';
+		p += bHexadecimal;
+		std::uint32_t code = 0;
+		const auto result = std::from_chars(p, i_pEnd, code, bHexadecimal ? 16 : 10);
+		if (result.ec != std::errc() || result.ptr == i_pEnd || *result.ptr != ';' || !IsXmlCharacter(code))
+			return Fail(pAt, "broken character reference");
+		p = result.ptr;
+	}
+	return true;
+}
+
+std::string VTextCheck::Error() const
+{
+	const auto line = 1 + m_LineEndsReplaced + std::count(static_cast<const char*>(m_rText.data()), m_pAt, '\n');
+	return "line " + std::to_string(line) + ": " + m_Error;
+}
+
+} // namespace
+
+bool UtilsRapidXml::CheckText(std::string& io_rText, std::string& o_rError)
+{
+	if (io_rText.size() > c_MaximumDocumentBytes)
+	{
+		o_rError = "text of " + std::to_string(io_rText.size()) + " bytes is larger than "
+		    + std::to_string(c_MaximumDocumentBytes);
+		return false;
+	}
+	VTextCheck check(io_rText);
+	if (check.Run())
+		return true;
+	o_rError = check.Error();
+	return false;
+}
