@@ -13,4 +13,7 @@ struct VSubjectRecord
 	VSubjectApplicationData m_SubjectApplicationData;
 };
 
+/// Exact, field by field.
+bool operator==(const VSubjectRecord& i_rLeft, const VSubjectRecord& i_rRight);
+
 } // namespace CoreOrlexTypes
