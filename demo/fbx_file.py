@@ -19,11 +19,11 @@ import struct
 import sys
 import zlib
 
-# Arrays of at least this many bytes are compressed, as most exporters do; below it zlib's frame costs more than it saves.
+# Arrays of at least this many bytes are compressed; below it zlib's frame costs more than it saves.
 COMPRESS_FROM_BYTES = 128
 
 BINARY_MAGIC = b"Kaydara FBX Binary  \x00\x1a\x00"
-# The format ties the footer to FileId and CreationTime; this triple belongs together and suits files without a real time.
+# The format ties the footer to FileId and CreationTime; these three belong together and suit files without a real time.
 CREATION_TIME = "1970-01-01 10:00:00:000"
 FILE_ID = bytes.fromhex("28b32aebb624ccc2bfc8b02aa92bfcf1")
 FOOTER_ID = bytes.fromhex("fabcab09d0c8d466b176fb831cf7267e")

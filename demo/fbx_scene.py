@@ -111,7 +111,9 @@ NODE_TEMPLATE = [
     prop("Lcl Scaling", "scaling", 1, 1, 1), prop("Visibility", "visibility", 1),
 ]
 
-SKELETON_TEMPLATE = [prop("Color", "color", 0.8, 0.8, 0.8), prop("Size", "double", 100), prop("LimbLength", "double", 1)]
+SKELETON_TEMPLATE = [
+    prop("Color", "color", 0.8, 0.8, 0.8), prop("Size", "double", 100), prop("LimbLength", "double", 1),
+]
 
 MESH_TEMPLATE = [
     prop("Color", "color", 0.8, 0.8, 0.8),

@@ -1,13 +1,13 @@
-"""Kestrel, the demo's character, as a rigger would describe it: where its joints are, how they are posed, how thick it is.
+"""Kestrel, the demo's character, as a rigger would describe it: its joints, how they are posed, how thick it is.
 
 Centimetres and degrees; Y is up, the character faces +Z and its left side is at +X.
 """
 
 
 class Bone:
-    """start and end are world positions in the T-pose. The joint's X axis runs from start to end, its Y axis is the part
-    of `up` at right angles to that. rotation is the pose in which the character is handed over, on top of the joint's
-    orientation. radius is that of the body around the bone, along the joint's Y and Z."""
+    """start and end are world positions in the T-pose. The joint's X axis runs from start to end, its Y axis is the
+    part of `up` at right angles to that. rotation is the pose in which the character is handed over, on top of
+    the joint's orientation. radius is that of the body around the bone, along the joint's Y and Z."""
 
     def __init__(self, name, parent, start, end, up, radius, rotation=(0, 0, 0), order=0, accent=False, aligned=False):
         self.name = name

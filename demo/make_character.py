@@ -11,7 +11,7 @@ import math
 import pathlib
 
 import fbx_file
-from fbx_file import Element, Int64, ObjectName, doubles, integers
+from fbx_file import Int64, ObjectName, doubles, integers
 from fbx_scene import branch, document, global_settings, model, node, null_attribute, prop, skeleton_attribute
 from kestrel import bones
 from matrix import (axis_rotation, column_major, euler, euler_angles, identity, multiply, rigid_inverse,
@@ -181,8 +181,10 @@ def add_tube(mesh, joint, child):
         for ring in range(len(RINGS) - 1):
             a, b = ring * SIDES, (ring + 1) * SIDES
             ua, ub = ring * (SIDES + 1), (ring + 1) * (SIDES + 1)
-            add_polygon([a + side, a + after, b + after, b + side], [ua + side, ua + side + 1, ub + side + 1, ub + side])
-        add_polygon([first_pole + 1, last + side, last + after], [first_uv_pole + 1, last_uv + side, last_uv + side + 1])
+            add_polygon([a + side, a + after, b + after, b + side],
+                        [ua + side, ua + side + 1, ub + side + 1, ub + side])
+        add_polygon([first_pole + 1, last + side, last + after],
+                    [first_uv_pole + 1, last_uv + side, last_uv + side + 1])
 
 
 def build_mesh(joints):

@@ -35,8 +35,8 @@ POSITION_VARIANCE = 1e8
 
 
 class Segment:
-    """offset is the place in the parent's frame, as expressions; orientation an angle-axis. bind is the joint's state in
-    the pose in which the performer is related to a character. For limits, centre and spread give the joint's range."""
+    """offset is the place in the parent's frame, as expressions; orientation an angle-axis. bind is the joint's state
+    in the pose in which the performer is related to a character. For limits, centre and spread give the joint's range."""
 
     def __init__(self, name, parent, joint, offset, bind=None, orientation="0 0 0", axes=None, centre=None, spread=None,
                  mass=None, mass_centre=None, gyration=None, style="tetra-stripe", labels=None):
@@ -85,8 +85,8 @@ SIDE = [
     Segment("Humerus", "Clavicle", "Ball", "0.5*ShoulderWidth 26*TrunkScale 8*TrunkScale", bind=[0.05, 0.61, 0],
             centre=[0, 0.5, -0.3], spread=[0.4, 0.9, 0.7], mass=0.028, mass_centre="0.436*UpperArmLength 0 0",
             gyration="0.1*UpperArmLength 0.322*UpperArmLength 0.322*UpperArmLength"),
-    Segment("Radius", "Humerus", "Hinge", "UpperArmLength 0 0", bind=[0.24], axes=[(0, 0, -1)], centre=[1.2], spread=[0.5],
-            mass=0.016, mass_centre="0.43*ForeArmLength 0 0",
+    Segment("Radius", "Humerus", "Hinge", "UpperArmLength 0 0", bind=[0.24], axes=[(0, 0, -1)], centre=[1.2],
+            spread=[0.5], mass=0.016, mass_centre="0.43*ForeArmLength 0 0",
             gyration="0.1*ForeArmLength 0.303*ForeArmLength 0.303*ForeArmLength", labels="Flexion"),
     Segment("Hand", "Radius", "HardySpicer", "ForeArmLength 0 0", bind=[0.05, 0.0], axes=[(0, 1, 0), (0, 0, 1)],
             mass=0.006, mass_centre="0.3*ForeArmLength 0 0", style="carton"),
@@ -271,7 +271,8 @@ def add_parameters(model):
 
 def add_joint(element, segment, values):
     size = STATE_SIZE[segment.joint]
-    pose = {"PRE-ORIENTATION": evaluated(segment.orientation, values), "PRE-POSITION": evaluated(segment.offset, values),
+    pose = {"PRE-ORIENTATION": evaluated(segment.orientation, values),
+            "PRE-POSITION": evaluated(segment.offset, values),
             "INVERSE-POST-ORIENTATION": "0 0 0", "INVERSE-POST-POSITION": "0 0 0"}
     template_pose = dict(pose, **{"PRE-ORIENTATION": segment.orientation, "PRE-POSITION": segment.offset})
     attributes = {"NAME": segment.name + "Joint", **pose}
@@ -279,7 +280,8 @@ def add_joint(element, segment, values):
     if size:
         free = segment.joint == "Free"
         t_pose = [0, 0, 0, 0, 0, PELVIS_HEIGHT] if free else [0] * size
-        statistics = {"MEAN": numbers(t_pose), "COVARIANCE": diagonal([VARIANCE] * min(size, 3) + [POSITION_VARIANCE] * (size - 3))}
+        variances = [VARIANCE] * min(size, 3) + [POSITION_VARIANCE] * (size - 3)
+        statistics = {"MEAN": numbers(t_pose), "COVARIANCE": diagonal(variances)}
         limits = {}
         if segment.centre:
             limits = {"RANGE-CENTRING-STATE": numbers(segment.centre), "RANGE-MATRIX": diagonal(segment.spread)}
