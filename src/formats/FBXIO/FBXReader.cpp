@@ -1,0 +1,250 @@
+#include "FBXIO/FBXReader.h"
+
+#include "DebugServices/GlobalLog.h"
+
+#include <boost/filesystem.hpp>
+
+#include <fbxsdk.h>
+
+#include <cmath>
+#include <functional>
+#include <map>
+#include <vector>
+
+namespace
+{
+
+/// A matrix of the SDK is stored for row vectors.
+QMatrix4x4 SystemMatrix(const FbxAMatrix& i_rMatrix)
+{
+	QMatrix4x4 matrix;
+	for (int row = 0; row < 4; ++row)
+		for (int column = 0; column < 4; ++column)
+			matrix(row, column) = float(i_rMatrix.Get(column, row));
+	return matrix;
+}
+
+void CheckTransform(QMatrix4x4& io_rMatrix, const std::string& i_rName)
+{
+	// Asking for the entries this way makes Qt forget what special kind of matrix it takes this one for.
+	const float* const pEntries = io_rMatrix.data();
+	for (int i = 0; i < 16; ++i)
+		if (!std::isfinite(pEntries[i]))
+		{
+			NVX_LOG("FBXIO", NVX::ELogError, "Invalid transform for: %1%; setting to identity", i_rName);
+			io_rMatrix.setToIdentity();
+			return;
+		}
+}
+
+void ScaleTranslation(QMatrix4x4& io_rMatrix, float i_Scale)
+{
+	for (int row = 0; row < 3; ++row)
+		io_rMatrix(row, 3) *= i_Scale;
+}
+
+} // namespace
+
+class FBXIO::FBXReader::VImpl
+{
+public:
+	~VImpl();
+
+	bool LoadFile(const std::string& i_rPath);
+
+	/// Calls i_rVisit with the node and all below it, in pre-order; true from it passes over what is below that node.
+	/// While it runs, m_NodeScale is the product of the local X scalings down to the node.
+	void ForEachNode(FbxNode* i_pRoot, const std::function<bool(FbxNode*)>& i_rVisit);
+
+	float m_UnitScale = 1.0f;
+	float m_NodeScale = 1.0f;
+	int m_UpAxis = 0;
+	bool m_bComplete = false;
+	std::shared_ptr<VSkinSkeleton> m_pSkeleton;
+
+private:
+	bool Initialize(const std::string& i_rPath);
+	void Import();
+	void ReadSettings();
+	bool ProcessSkeletonNode(FbxNode* i_pNode);
+
+	/// The last bone of each name.
+	std::map<std::string, std::int64_t> m_BoneOfName;
+	FbxManager* m_pManager = nullptr;
+	FbxScene* m_pScene = nullptr;
+	FbxImporter* m_pImporter = nullptr;
+};
+
+FBXIO::FBXReader::VImpl::~VImpl()
+{
+	if (m_pImporter)
+		m_pImporter->Destroy(false);
+	if (m_pScene)
+		m_pScene->Destroy(false);
+	if (m_pManager)
+		m_pManager->Destroy();
+}
+
+bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
+{
+	boost::system::error_code error;
+	if (boost::filesystem::status(i_rPath, error).type() != boost::filesystem::regular_file)
+	{
+		NVX_LOG("FBXIO", NVX::ELogError, "File %1% not found", i_rPath);
+		return false;
+	}
+	NVX_LOG("FBXIO", NVX::ELogInformation, "Loading file %1%", i_rPath);
+	m_pManager = FbxManager::Create();
+	if (!m_pManager)
+		return false;
+	m_pScene = FbxScene::Create(m_pManager, i_rPath.c_str());
+	m_pImporter = FbxImporter::Create(m_pManager, i_rPath.c_str());
+	if (!m_pScene || !m_pImporter || !Initialize(i_rPath))
+		return false;
+	Import();
+	ReadSettings();
+	ForEachNode(m_pScene->GetRootNode(), [this](FbxNode* i_pNode) { return ProcessSkeletonNode(i_pNode); });
+	return true;
+}
+
+bool FBXIO::FBXReader::VImpl::Initialize(const std::string& i_rPath)
+{
+	int format = -1;
+	FbxIOPluginRegistry* const pRegistry = m_pManager->GetIOPluginRegistry();
+	if (!pRegistry->DetectReaderFileFormat(i_rPath.c_str(), format))
+		format = pRegistry->GetNativeReaderFormat();
+	if (m_pImporter->Initialize(i_rPath.c_str(), format, nullptr))
+		return true;
+
+	NVX_LOG("FBXIO", NVX::ELogError, "Call to KFbxImporter::Initialize() failed.");
+	NVX_LOG("FBXIO", NVX::ELogError, "Error returned: %1%", m_pImporter->GetStatus().GetErrorString());
+	int major = 0, minor = 0, revision = 0;
+	m_pImporter->GetFileVersion(major, minor, revision);
+	if (m_pImporter->GetStatus().GetCode() == FbxStatus::eInvalidFileVersion)
+	{
+		NVX_LOG("FBXIO", NVX::ELogError, "FBX file import error: File version is old or too new.\n");
+		NVX_LOG("FBXIO", NVX::ELogError, "FBX version number for file %1% is %2%.%3%.%4%\n\n", i_rPath, major, minor,
+		    revision);
+		NVX_LOG("FBXIO", NVX::ELogError, "Current FBX version is %d.%d.%d\n", 2020, 0, 1);
+	}
+	return false;
+}
+
+void FBXIO::FBXReader::VImpl::Import()
+{
+	m_bComplete = m_pImporter->Import(m_pScene, false);
+	if (m_bComplete)
+		return;
+	if (m_pImporter->GetStatus().GetCode() == FbxStatus::ePasswordError)
+		NVX_LOG("FBXIO", NVX::ELogError, "FBX Importer: password Required");
+	else
+		NVX_LOG("FBXIO", NVX::ELogError, "Error returned: %1%", m_pImporter->GetStatus().GetErrorString());
+}
+
+void FBXIO::FBXReader::VImpl::ReadSettings()
+{
+	const FbxSystemUnit unit = m_pScene->GetGlobalSettings().GetSystemUnit();
+	m_UnitScale = float(unit.GetMultiplier() * unit.GetScaleFactor() * 10.0);
+	int sign = 1;
+	switch (m_pScene->GetGlobalSettings().GetAxisSystem().GetUpVector(sign))
+	{
+	case FbxAxisSystem::eYAxis: m_UpAxis = 1; break;
+	case FbxAxisSystem::eZAxis: m_UpAxis = 2; break;
+	default: m_UpAxis = 0; break;
+	}
+}
+
+void FBXIO::FBXReader::VImpl::ForEachNode(FbxNode* i_pRoot, const std::function<bool(FbxNode*)>& i_rVisit)
+{
+	struct VLevel
+	{
+		FbxNode* m_pNode;
+		int m_NextChild;
+		float m_ScaleBefore;
+	};
+	std::vector<VLevel> open;
+	const auto enter = [&](FbxNode* i_pNode)
+	{
+		const float before = m_NodeScale;
+		m_NodeScale *= float(i_pNode->EvaluateLocalScaling()[0]);
+		if (!i_rVisit(i_pNode))
+			open.push_back({i_pNode, 0, before});
+	};
+	enter(i_pRoot);
+	while (!open.empty())
+	{
+		VLevel& rLevel = open.back();
+		if (rLevel.m_NextChild < rLevel.m_pNode->GetChildCount())
+			enter(rLevel.m_pNode->GetChild(rLevel.m_NextChild++));
+		else
+		{
+			m_NodeScale = rLevel.m_ScaleBefore;
+			open.pop_back();
+		}
+	}
+}
+
+bool FBXIO::FBXReader::VImpl::ProcessSkeletonNode(FbxNode* i_pNode)
+{
+	FbxSkeleton* const pAttribute = i_pNode->GetSkeleton();
+	if (!pAttribute)
+		return false;
+	if (!m_pSkeleton)
+		m_pSkeleton = std::make_shared<VSkinSkeleton>();
+
+	VSkinBone& rBone = m_pSkeleton->emplace_back();
+	rBone.m_Name = i_pNode->GetName();
+	rBone.m_AccumulatedScale = m_NodeScale;
+	if (!pAttribute->IsSkeletonRoot() && i_pNode->GetParent())
+		if (const auto found = m_BoneOfName.find(i_pNode->GetParent()->GetName()); found != m_BoneOfName.end())
+			rBone.m_ParentIndex = found->second;
+	m_BoneOfName.insert_or_assign(rBone.m_Name, std::int64_t(m_pSkeleton->size()) - 1);
+
+	const FbxAMatrix preRotation(
+	    FbxVector4(0.0, 0.0, 0.0, 1.0), i_pNode->GetPreRotation(FbxNode::eSourcePivot), FbxVector4(1.0, 1.0, 1.0, 1.0));
+	rBone.m_PreRotation = SystemMatrix(preRotation);
+	CheckTransform(rBone.m_PreRotation, rBone.m_Name);
+
+	rBone.m_Local = SystemMatrix(i_pNode->EvaluateLocalTransform() * preRotation.Inverse());
+	CheckTransform(rBone.m_Local, rBone.m_Name);
+	ScaleTranslation(rBone.m_Local, m_UnitScale);
+
+	rBone.m_Global = SystemMatrix(i_pNode->EvaluateGlobalTransform());
+	CheckTransform(rBone.m_Global, rBone.m_Name);
+	ScaleTranslation(rBone.m_Global, m_UnitScale);
+	return false;
+}
+
+FBXIO::FBXReader::FBXReader() : m_pImpl(std::make_unique<VImpl>()) {}
+
+FBXIO::FBXReader::~FBXReader() = default;
+
+bool FBXIO::FBXReader::LoadFile(const std::string& i_rPath)
+{
+	return m_pImpl->LoadFile(i_rPath);
+}
+
+bool FBXIO::FBXReader::IsComplete() const
+{
+	return m_pImpl->m_bComplete;
+}
+
+bool FBXIO::FBXReader::HasSkeleton() const
+{
+	return m_pImpl->m_pSkeleton != nullptr;
+}
+
+int FBXIO::FBXReader::GetUpAxis() const
+{
+	return m_pImpl->m_UpAxis;
+}
+
+float FBXIO::FBXReader::GetUnitScale() const
+{
+	return m_pImpl->m_UnitScale;
+}
+
+std::shared_ptr<const FBXIO::VSkinSkeleton> FBXIO::FBXReader::GetSkeleton() const
+{
+	return m_pImpl->m_pSkeleton;
+}

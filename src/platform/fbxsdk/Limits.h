@@ -1,0 +1,31 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+
+/// What a file may ask of this machine. Files come from anywhere, so every size that a file claims is held against
+/// one of these, or against the bytes that back it, before memory is taken.
+namespace FbxFile::Limits
+{
+
+/// Records inside records. Exporters use about ten; the limit keeps hostile nesting from costing anything.
+inline constexpr std::size_t c_RecordDepth = 64;
+
+/// Positions in a file are kept in 32 bits, and the whole file stands in memory. Characters are below 0.5 GiB.
+inline constexpr std::uint64_t c_FileBytes = std::uint64_t(2) << 30;
+
+/// Records of one file: 28 bytes each and half as much again while their list grows stay below 128 MB. Large scenes
+/// with animation have some hundred thousand.
+inline constexpr std::size_t c_Records = 2'000'000;
+
+/// All arrays that are decoded from one file, as bytes of their final storage.
+inline constexpr std::uint64_t c_DecodedBytes = 256'000'000;
+
+/// The best ratio that the deflate format can reach: 258 bytes from two bits. An array that claims more than this
+/// cannot be in the bytes that it has.
+inline constexpr std::uint64_t c_DeflateRatio = 1032;
+
+/// How far the text form is searched for its version before the file counts as something else.
+inline constexpr std::size_t c_TextHeaderBytes = 65536;
+
+} // namespace FbxFile::Limits

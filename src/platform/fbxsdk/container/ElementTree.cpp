@@ -1,0 +1,83 @@
+#include "fbxsdk/container/ElementTree.h"
+
+#include "fbxsdk/Limits.h"
+#include "fbxsdk/container/FileKind.h"
+#include "fbxsdk/container/TreeBuilder.h"
+
+bool FbxFile::VElementTree::Read(std::string_view i_Bytes, const VFileKind& i_rKind)
+{
+	VTreeBuilder builder(*this, i_Bytes);
+	switch (i_rKind.m_Kind)
+	{
+	case EFileKind::Binary: ReadBinaryRecords(i_Bytes, i_rKind.m_Version, builder); break;
+	case EFileKind::Text: ReadTextRecords(i_Bytes, builder); break;
+	case EFileKind::None:
+	case EFileKind::BinaryBigEndian: builder.Error("it is of no kind that is read", 0); break;
+	}
+	return m_Error.empty();
+}
+
+std::string_view FbxFile::VElementTree::Name(VElementIndex i_Element) const
+{
+	return m_Bytes.substr(m_Elements[i_Element].m_Name, m_Elements[i_Element].m_NameLength);
+}
+
+std::string_view FbxFile::VElementTree::Values(VElementIndex i_Element) const
+{
+	return m_Bytes.substr(m_Elements[i_Element].m_Values, m_Elements[i_Element].m_ValuesSize);
+}
+
+FbxFile::VElementIndex FbxFile::VElementTree::Find(VElementIndex i_Parent, std::string_view i_Name) const
+{
+	for (const VElementIndex child : Children(i_Parent))
+		if (Name(child) == i_Name)
+			return child;
+	return c_NoElement;
+}
+
+FbxFile::VElementTree::VChildren FbxFile::VElementTree::Children(VElementIndex i_Parent) const
+{
+	const VElementIndex first = i_Parent == c_NoElement ? c_NoElement : m_Elements[i_Parent].m_FirstChild;
+	return {{*this, first}, {*this, c_NoElement}};
+}
+
+FbxFile::VTreeBuilder::VTreeBuilder(VElementTree& io_rTree, std::string_view i_Bytes) : m_rTree(io_rTree)
+{
+	m_rTree.m_Bytes = i_Bytes;
+	m_Open.push_back({VElementTree::c_Root, c_NoElement, i_Bytes.size()});
+}
+
+bool FbxFile::VTreeBuilder::Add(const VElement& i_rElement)
+{
+	if (m_rTree.m_Elements.size() >= Limits::c_Records)
+	{
+		Error("it has more records than are read", i_rElement.m_Name);
+		return false;
+	}
+	const VElementIndex added = VElementIndex(m_rTree.m_Elements.size());
+	m_rTree.m_Elements.push_back(i_rElement);
+	VOpen& rOpen = m_Open.back();
+	if (rOpen.m_LastChild == c_NoElement)
+		m_rTree.m_Elements[rOpen.m_Element].m_FirstChild = added;
+	else
+		m_rTree.m_Elements[rOpen.m_LastChild].m_NextSibling = added;
+	rOpen.m_LastChild = added;
+	return true;
+}
+
+bool FbxFile::VTreeBuilder::Open(std::size_t i_End)
+{
+	if (m_Open.size() > Limits::c_RecordDepth)
+	{
+		Error("its records lie too deep in one another", Last().m_Name);
+		return false;
+	}
+	m_Open.push_back({VElementIndex(m_rTree.m_Elements.size() - 1), c_NoElement, i_End});
+	return true;
+}
+
+void FbxFile::VTreeBuilder::Error(std::string_view i_What, std::size_t i_Position)
+{
+	if (m_rTree.m_Error.empty())
+		m_rTree.m_Error = std::string(i_What) + " (byte " + std::to_string(i_Position) + ")";
+}

@@ -1,0 +1,104 @@
+#include "fbxsdk/container/TextScan.h"
+
+#include <array>
+#include <cstring>
+
+namespace
+{
+
+enum EByteClass : unsigned char
+{
+	EBlank = 1,
+	ELineEnd = 2,
+	/// Ends a name.
+	ENameEnd = 4,
+	/// Ends a bare value.
+	EValueEnd = 8
+};
+
+constexpr std::array<unsigned char, 256> c_ByteClasses = []
+{
+	std::array<unsigned char, 256> classes{};
+	const auto mark = [&classes](std::string_view i_Bytes, unsigned char i_Class)
+	{
+		for (const char byte : i_Bytes)
+			classes[static_cast<unsigned char>(byte)] |= i_Class;
+	};
+	mark(" \t", EBlank);
+	mark("\r\n\f\v", ELineEnd);
+	mark(" \t\r\n\f\v{},\";*:", ENameEnd);
+	mark(" \t\r\n\f\v{},\";:", EValueEnd);
+	return classes;
+}();
+
+bool Is(char i_Byte, unsigned char i_Classes)
+{
+	return c_ByteClasses[static_cast<unsigned char>(i_Byte)] & i_Classes;
+}
+
+const char* Find(const char* i_pFrom, const char* i_pEnd, char i_Byte)
+{
+	return static_cast<const char*>(std::memchr(i_pFrom, i_Byte, i_pEnd - i_pFrom));
+}
+
+} // namespace
+
+const char* FbxFile::Text::SkipByteOrderMark(const char* i_pFrom, const char* i_pEnd)
+{
+	return i_pEnd - i_pFrom >= 3 && std::memcmp(i_pFrom, "\xEF\xBB\xBF", 3) == 0 ? i_pFrom + 3 : i_pFrom;
+}
+
+const char* FbxFile::Text::SkipBlanks(const char* i_pFrom, const char* i_pEnd)
+{
+	while (i_pFrom != i_pEnd && Is(*i_pFrom, EBlank))
+		++i_pFrom;
+	return i_pFrom;
+}
+
+const char* FbxFile::Text::SkipSpace(const char* i_pFrom, const char* i_pEnd)
+{
+	while (i_pFrom != i_pEnd)
+	{
+		if (Is(*i_pFrom, EBlank | ELineEnd))
+			++i_pFrom;
+		else if (*i_pFrom == ';')
+			i_pFrom = SkipLine(i_pFrom, i_pEnd);
+		else
+			break;
+	}
+	return i_pFrom;
+}
+
+const char* FbxFile::Text::SkipLine(const char* i_pFrom, const char* i_pEnd)
+{
+	while (i_pFrom != i_pEnd && *i_pFrom != '\n' && *i_pFrom != '\r')
+		++i_pFrom;
+	return i_pFrom;
+}
+
+const char* FbxFile::Text::ScanName(const char* i_pFrom, const char* i_pEnd)
+{
+	while (i_pFrom != i_pEnd && !Is(*i_pFrom, ENameEnd))
+		++i_pFrom;
+	return i_pFrom;
+}
+
+const char* FbxFile::Text::ScanValue(const char* i_pFrom, const char* i_pEnd)
+{
+	if (i_pFrom != i_pEnd && *i_pFrom == '"')
+	{
+		const char* const pQuote = Find(i_pFrom + 1, i_pEnd, '"');
+		return pQuote ? pQuote + 1 : nullptr;
+	}
+	while (i_pFrom != i_pEnd && !Is(*i_pFrom, EValueEnd))
+		++i_pFrom;
+	return i_pFrom;
+}
+
+const char* FbxFile::Text::NextValue(const char* i_pFrom, const char* i_pEnd)
+{
+	i_pFrom = SkipSpace(i_pFrom, i_pEnd);
+	if (i_pFrom == i_pEnd || *i_pFrom != ',')
+		return nullptr;
+	return SkipSpace(i_pFrom + 1, i_pEnd);
+}

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "fbxsdk/container/ElementTree.h"
+
+namespace FbxFile
+{
+
+/// What the two readers share: the records that are open, and the list of findings. No recursion: the depth of a file
+/// is the size of a list.
+class VTreeBuilder
+{
+public:
+	VTreeBuilder(VElementTree& io_rTree, std::string_view i_Bytes);
+
+	/// Adds a record as the last child of the innermost open one. False if there are too many records: reading ends.
+	bool Add(const VElement& i_rElement);
+
+	/// Opens the record that was added last. False if it lies too deep. i_End is where its content ends at the latest.
+	bool Open(std::size_t i_End);
+	void Close() { m_Open.pop_back(); }
+	std::size_t Depth() const { return m_Open.size(); }
+	std::size_t End() const { return m_Open.back().m_End; }
+
+	VElement& Last() { return m_rTree.m_Elements.back(); }
+
+	/// Notes what is broken, with its place. Only the first is kept.
+	void Error(std::string_view i_What, std::size_t i_Position);
+
+private:
+	struct VOpen
+	{
+		VElementIndex m_Element;
+		VElementIndex m_LastChild;
+		std::size_t m_End;
+	};
+
+	VElementTree& m_rTree;
+	std::vector<VOpen> m_Open;
+};
+
+/// Both add what they find below the root. i_rBuilder has the root open, up to the end of the bytes.
+void ReadBinaryRecords(std::string_view i_Bytes, std::uint32_t i_Version, VTreeBuilder& io_rBuilder);
+void ReadTextRecords(std::string_view i_Bytes, VTreeBuilder& io_rBuilder);
+
+} // namespace FbxFile

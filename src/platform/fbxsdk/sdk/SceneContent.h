@@ -1,0 +1,20 @@
+#pragma once
+
+#include "fbxsdk/container/ElementTree.h"
+#include "fbxsdk/container/FileBytes.h"
+#include "fbxsdk/document/Document.h"
+#include "fbxsdk/sdk/Node.h"
+#include "fbxsdk/sdk/Scene.h"
+
+#include <memory>
+#include <vector>
+
+/// Node 0 is the root. The file stays, since what is large in it is read from there when somebody asks.
+struct fbxsdk::FbxScene::VContent
+{
+	FbxFile::VFileBytes m_Bytes;
+	FbxFile::VElementTree m_Tree;
+	std::unique_ptr<FbxFile::VDocument> m_pDocument;
+	std::vector<std::unique_ptr<FbxNode>> m_Nodes;
+	std::vector<std::unique_ptr<FbxNodeAttribute>> m_Attributes;
+};
