@@ -12,7 +12,8 @@ bool FbxFile::VElementTree::Read(std::string_view i_Bytes, const VFileKind& i_rK
 	case EFileKind::Binary: ReadBinaryRecords(i_Bytes, i_rKind.m_Version, builder); break;
 	case EFileKind::Text: ReadTextRecords(i_Bytes, builder); break;
 	case EFileKind::None:
-	case EFileKind::BinaryBigEndian: builder.Error("it is of no kind that is read", 0); break;
+	case EFileKind::BinaryBigEndian:
+	case EFileKind::DamagedBinary: builder.Error("it is of no kind that is read", 0); break;
 	}
 	return m_Error.empty();
 }

@@ -12,6 +12,8 @@ namespace
 using namespace std::string_view_literals;
 
 constexpr std::string_view c_Magic = "Kaydara FBX Binary  \0\x1a"sv;
+/// What is left of it after a transfer as text.
+constexpr std::string_view c_ReadableMagic = "Kaydara FBX Binary"sv;
 
 /// "; FBX 7.4.0 project file", the first line of what most exporters write.
 std::uint32_t VersionOfComment(std::string_view i_Line)
@@ -52,13 +54,16 @@ FbxFile::VFileKind FbxFile::DetectFileKind(std::string_view i_Head)
 	if (i_Head.starts_with(c_Magic))
 	{
 		if (i_Head.size() < c_BinaryHeaderSize)
-			return {};
+			return {EFileKind::DamagedBinary};
 		std::uint32_t version = 0;
 		std::memcpy(&version, i_Head.data() + 23, sizeof(version));
 		if (i_Head[22] == 0)
 			return {EFileKind::Binary, version};
 		return {EFileKind::BinaryBigEndian, __builtin_bswap32(version)};
 	}
+
+	if (i_Head.starts_with(c_ReadableMagic))
+		return {EFileKind::DamagedBinary};
 
 	const char* const pEnd = i_Head.data() + i_Head.size();
 	const char* const pFirst = Text::SkipByteOrderMark(i_Head.data(), pEnd);

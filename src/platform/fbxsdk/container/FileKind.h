@@ -11,6 +11,8 @@ enum class EFileKind
 	None,
 	Binary,
 	BinaryBigEndian,
+	/// Its first bytes are those of the binary form, but not all of them.
+	DamagedBinary,
 	Text
 };
 

@@ -47,6 +47,8 @@ bool fbxsdk::FbxImporter::Initialize(const char* pFileName, int pFileFormat, Fbx
 	m_Version = kind.m_Version;
 	if (kind.m_Kind == EFileKind::None)
 		return Fail(FbxStatus::eInvalidFile, head.View().empty() ? "File is empty" : "File is not an FBX file");
+	if (kind.m_Kind == EFileKind::DamagedBinary)
+		return Fail(FbxStatus::eInvalidFile, "File is corrupted: its first bytes are damaged");
 	if (kind.m_Kind == EFileKind::BinaryBigEndian)
 		return Fail(FbxStatus::eInvalidFile, "File is written in big-endian byte order, which is not read");
 	if (kind.m_Version < FbxFile::c_OldestVersion || kind.m_Version >= FbxFile::c_TooNewVersion)

@@ -17,7 +17,8 @@ bool fbxsdk::FbxIOPluginRegistry::DetectReaderFileFormat(const char* pFileName, 
 	case FbxFile::EFileKind::None: return false;
 	case FbxFile::EFileKind::Text: pFileFormat = c_TextFormat; return true;
 	case FbxFile::EFileKind::Binary:
-	case FbxFile::EFileKind::BinaryBigEndian: break;
+	case FbxFile::EFileKind::BinaryBigEndian:
+	case FbxFile::EFileKind::DamagedBinary: break;
 	}
 	pFileFormat = c_BinaryFormat;
 	return true;
