@@ -1,5 +1,6 @@
 #include "math/NumberText.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <limits>
@@ -146,13 +147,20 @@ bool NumberText::ScanWholeReal(std::string_view i_Text, double& o_rValue)
 	return true;
 }
 
-void NumberText::AppendG17(std::string& io_rText, double i_Value)
+void NumberText::AppendG(std::string& io_rText, double i_Value, int i_Digits)
 {
 	if (AppendNotFinite(io_rText, i_Value))
 		return;
-	char buffer[32];
-	const auto result = std::to_chars(buffer, buffer + sizeof(buffer), i_Value, std::chars_format::general, 17);
+	// The digits, up to four zeros before them, sign, point and exponent; a double has at most 767 digits.
+	char buffer[800];
+	const auto result =
+	    std::to_chars(buffer, buffer + sizeof(buffer), i_Value, std::chars_format::general, std::min(i_Digits, 770));
 	io_rText.append(buffer, result.ptr);
+}
+
+void NumberText::AppendG17(std::string& io_rText, double i_Value)
+{
+	AppendG(io_rText, i_Value, 17);
 }
 
 std::string NumberText::PrintG17(double i_Value)

@@ -22,6 +22,9 @@ bool ScanWholeReal(std::string_view i_Text, double& o_rValue);
 void AppendG17(std::string& io_rText, double i_Value);
 std::string PrintG17(double i_Value);
 
+/// As AppendG17 with another number of significant digits.
+void AppendG(std::string& io_rText, double i_Value, int i_Digits);
+
 /// Equals printf's "%f" byte for byte for finite values; the others as PrintG17.
 std::string PrintF(double i_Value);
 

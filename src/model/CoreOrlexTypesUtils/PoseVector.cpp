@@ -1,0 +1,21 @@
+#include "CoreOrlexTypesUtils/PoseVector.h"
+
+#include "CoreOrlexTypes/JointType.h"
+
+#include <algorithm>
+
+std::vector<double> CoreOrlexTypesUtils::PoseVector(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
+    std::vector<double> CoreOrlexTypes::VSubjectParametrised::VJoint::*i_pStatistic)
+{
+	std::vector<double> pose;
+	pose.reserve(6 + 3 * i_rSubject.m_Segments.size());
+	for (const auto& rSegment : i_rSubject.m_Segments)
+	{
+		const std::vector<double>& rStatistic = rSegment.m_Joint.*i_pStatistic;
+		const std::size_t size = CoreOrlexTypes::StateSize(rSegment.m_Joint.m_JointType);
+		const std::size_t given = std::min(size, rStatistic.size());
+		pose.insert(pose.end(), rStatistic.begin(), rStatistic.begin() + std::ptrdiff_t(given));
+		pose.insert(pose.end(), size - given, 0.0);
+	}
+	return pose;
+}
