@@ -1,0 +1,29 @@
+#pragma once
+
+#include "CoreOrlexQRTIO/SubjectQRTExtras.h"
+#include "CoreOrlexTypes/SubjectParametrised.h"
+#include "numerics/Rotation.h"
+
+namespace RetargetSetup
+{
+
+/// The covariance of a joint that nothing is known about, of the size that its type prescribes.
+void DefaultCovariance(CoreOrlexTypes::VSubjectParametrised::VJoint& io_rJoint);
+
+/// Gives a segment without a joint (type Dummy) one: Free for segment 0, Ball for the others. Mean and bind pose are
+/// the rotation (angle-axis) with zeros behind it. Does nothing to other joints.
+void EnableJoint(CoreOrlexTypes::VSubjectParametrised& io_rSubject, std::size_t i_SegmentIndex,
+    const Rotation::VVector3& i_rRotation);
+
+/// EnableJoint without a rotation for every segment but the root.
+/// @param io_rExtras of the file that the subject comes from: T-pose constraints stay in step with the joints.
+void EnableAllJoints(CoreOrlexTypes::VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras);
+
+/// Takes the joint from every segment, the root aside, that carries no target of its own; targets of its children do
+/// not count. The bind pose of a Ball joint goes into the segment's pre-rotation, as bind pose times pre-rotation: this
+/// keeps the world pose only where one of the two is zero. Joints of other types lose theirs.
+/// @param io_rExtras as above.
+void RemoveJointsWithoutTargets(
+    CoreOrlexTypes::VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras);
+
+} // namespace RetargetSetup

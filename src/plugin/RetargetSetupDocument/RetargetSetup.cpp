@@ -1,0 +1,197 @@
+#include "RetargetSetupDocument/RetargetSetup.h"
+
+#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupDocument/GlobalScale.h"
+#include "RetargetSetupDocument/Identity.h"
+
+using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectApplicationData;
+using CoreOrlexTypes::VSubjectParametrised;
+using NVX::CountedPointer;
+using RetargetSetup::c_LogCategory;
+using TesselPluginInterface::IFlowItem;
+using TesselPluginInterface::ItemValue;
+
+namespace
+{
+
+/// The scene tells the two subjects apart by their flow types.
+const std::string c_SourceFlavour;
+const std::string c_TargetFlavour = "ForSolving";
+
+template <typename T>
+bool CopyOut(const std::shared_ptr<const T>& i_rpValue, T& o_rValue)
+{
+	if (i_rpValue)
+		o_rValue = *i_rpValue;
+	return i_rpValue != nullptr;
+}
+
+} // namespace
+
+VRetargetSetup::VRetargetSetup(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
+    CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory,
+    CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory)
+    : m_pDispatcher(std::move(i_pDispatcher)), m_pFrameFactory(std::move(i_pFrameFactory)),
+      m_pItemFactory(std::move(i_pItemFactory)), m_pSourceSegmentModel(std::make_shared<VRetargetSetupSegmentModel>(
+                                                     VRetargetSetupSegmentModel::EFlavour::ESource)),
+      m_pTargetSegmentModel(
+          std::make_shared<VRetargetSetupSegmentModel>(VRetargetSetupSegmentModel::EFlavour::ETarget)),
+      m_pTargetModel(std::make_shared<VRetargetSetupTargetModel>())
+{
+}
+
+VRetargetSetup::~VRetargetSetup() = default;
+
+void VRetargetSetup::SetJointSymmetry(bool i_bJointSymmetry)
+{
+	if (i_bJointSymmetry == m_bJointSymmetry)
+		return;
+	m_bJointSymmetry = i_bJointSymmetry;
+	emit jointSymmetryChanged();
+}
+
+void VRetargetSetup::SetTargetRootIndex(std::uint32_t i_RootIndex)
+{
+	m_TargetRootIndex = i_RootIndex;
+	m_bTargetRootChosen = true;
+}
+
+void VRetargetSetup::SetTargetScale(double i_Scale)
+{
+	if (!RetargetSetup::IsUsableScale(i_Scale))
+	{
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "A scale must be a finite number above 0, not %1%: the old one stays",
+		    i_Scale);
+		return;
+	}
+	m_TargetScale = i_Scale;
+	const std::shared_ptr<const VSubjectParametrised> pOld = TargetValues().m_pParametrised;
+	if (!pOld)
+		return;
+	if (const std::string dropped = RetargetSetup::DroppedParameters(*pOld); !dropped.empty())
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The new scale drops the dynamic parameters '%1%'", dropped);
+	VSubjectParametrised subject = *pOld;
+	RetargetSetup::SetGlobalScale(subject, i_Scale);
+	SetTargetSubjectParametrised(std::move(subject));
+}
+
+double VRetargetSetup::GetTargetScale() const
+{
+	const std::shared_ptr<const VSubjectParametrised> pSubject = TargetValues().m_pParametrised;
+	return pSubject ? RetargetSetup::GetGlobalScale(*pSubject) : 1.0;
+}
+
+bool VRetargetSetup::GetSourceTemplate(VSubject& o_rSubject) const
+{
+	return CopyOut(SourceValues().m_pSubject, o_rSubject);
+}
+
+bool VRetargetSetup::GetSourceSubject(VSubjectParametrised& o_rSubject) const
+{
+	return CopyOut(SourceValues().m_pParametrised, o_rSubject);
+}
+
+bool VRetargetSetup::GetTargetTemplate(VSubject& o_rSubject) const
+{
+	return CopyOut(TargetValues().m_pSubject, o_rSubject);
+}
+
+bool VRetargetSetup::GetTargetSubject(VSubjectParametrised& o_rSubject) const
+{
+	return CopyOut(TargetValues().m_pParametrised, o_rSubject);
+}
+
+bool VRetargetSetup::GetTargetSubjectAndData(
+    VSubjectParametrised& o_rSubject, VSubjectApplicationData& o_rApplicationData) const
+{
+	const VSubjectValues values = TargetValues();
+	return values.m_pApplicationData && CopyOut(values.m_pParametrised, o_rSubject)
+	    && CopyOut(values.m_pApplicationData, o_rApplicationData);
+}
+
+void VRetargetSetup::SetSourceSubject(VSubjectParametrised i_Parametrised, VSubjectApplicationData i_ApplicationData)
+{
+	Replace(m_SourceItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
+	    std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)));
+}
+
+void VRetargetSetup::SetTargetSubject(VSubjectParametrised i_Parametrised, VSubjectApplicationData i_ApplicationData,
+    CoreOrlexQRTIO::VSubjectQRTExtras i_Extras)
+{
+	if (Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
+	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData))))
+		m_TargetExtras = std::move(i_Extras);
+}
+
+void VRetargetSetup::SetTargetSubjectParametrised(VSubjectParametrised i_Parametrised)
+{
+	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)), nullptr);
+}
+
+VRetargetSetup::VSubjectValues VRetargetSetup::ValuesOf(const VSubjectItems& i_rItems)
+{
+	return {ItemValue<VSubject>(i_rItems.m_pSubject), ItemValue<VSubjectApplicationData>(i_rItems.m_pApplicationData),
+	    ItemValue<VSubjectParametrised>(i_rItems.m_pParametrised)};
+}
+
+template <typename T>
+CountedPointer<IFlowItem> VRetargetSetup::MakeItem(
+    const VSubjectItems& i_rItems, const char* i_pFlowType, std::shared_ptr<const T> i_pValue)
+{
+	const std::string flowType = i_pFlowType + (&i_rItems == &m_SourceItems ? c_SourceFlavour : c_TargetFlavour);
+	CountedPointer<IFlowItem> pItem = m_pItemFactory->CreateItem(flowType);
+	if (TesselPluginInterface::SetItemValue<T>(pItem, std::move(i_pValue)))
+		return pItem;
+	NVX_LOG(c_LogCategory, NVX::ELogError, "The host makes no item of type '%1%': the change is dropped", flowType);
+	return {};
+}
+
+bool VRetargetSetup::Replace(VSubjectItems& io_rItems, std::shared_ptr<const VSubjectParametrised> i_pParametrised,
+    std::shared_ptr<const VSubjectApplicationData> i_pApplicationData)
+{
+	auto pSubject = std::make_shared<VSubject>();
+	// A subject that converts in part is still shown and edited; the converter has told what is wrong with it.
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(*i_pParametrised, *pSubject);
+
+	VSubjectItems items = io_rItems;
+	items.m_pSubject = MakeItem<VSubject>(io_rItems, "FlowSubject", std::move(pSubject));
+	items.m_pParametrised = MakeItem(io_rItems, "FlowSubjectParametrised", std::move(i_pParametrised));
+	if (i_pApplicationData)
+	{
+		items.m_pApplicationData = MakeItem(io_rItems, "FlowSubjectApplicationData", std::move(i_pApplicationData));
+		if (!items.m_pApplicationData)
+			return false;
+	}
+	if (!items.m_pSubject || !items.m_pParametrised)
+		return false;
+	std::swap(io_rItems, items);
+	Publish();
+	return true;
+}
+
+void VRetargetSetup::Publish()
+{
+	m_pFrame = m_pFrameFactory->CreateFrame();
+	if (m_pFrame)
+	{
+		for (const VSubjectItems* const pItems : {&m_SourceItems, &m_TargetItems})
+		{
+			m_pFrame->AddItem(pItems->m_pSubject);
+			m_pFrame->AddItem(pItems->m_pApplicationData);
+			m_pFrame->AddItem(pItems->m_pParametrised);
+		}
+	}
+	else
+		NVX_LOG(c_LogCategory, NVX::ELogError, "The host makes no frame: the preview cannot follow");
+
+	if (auto pSource = SourceValues().m_pParametrised)
+		m_pSourceSegmentModel->SetSubject(std::move(pSource));
+	if (const auto pTarget = TargetValues().m_pParametrised)
+	{
+		m_pTargetSegmentModel->SetSubject(pTarget);
+		m_pTargetModel->SetSubject(pTarget);
+	}
+	m_ChangedSignal.Fire();
+}

@@ -1,0 +1,196 @@
+#pragma once
+
+#include "CoreOrlexQRTIO/SubjectQRTExtras.h"
+#include "CoreOrlexTypes/Subject.h"
+#include "CoreOrlexTypes/SubjectApplicationData.h"
+#include "CoreOrlexTypes/SubjectParametrised.h"
+#include "FBXIO/SkinSkeleton.h"
+#include "NVX/Signal.h"
+#include "RetargetSetupDocument/RetargetSetupSegmentModel.h"
+#include "RetargetSetupDocument/RetargetSetupTargetModel.h"
+#include "TesselPluginInterface/IDispatcher.h"
+#include "TesselPluginInterface/IFlowFrame.h"
+#include "TesselPluginInterface/IItemFactory.h"
+
+#include <QMatrix4x4>
+#include <QObject>
+#include <QUrl>
+#include <boost/filesystem/path.hpp>
+
+#include <memory>
+#include <string>
+
+/// The document of the panel: the source subject (the performer's skeleton, which is only read), the target subject
+/// (the character's, which is edited and saved) and the FBX skeleton that a target subject is made from.
+///
+/// The subjects live in six flow items, which are replaced and never changed. Every change ends in a new frame with the
+/// items, fresh list models and one firing of the change signal. There is no undo. What an operation needs and does not
+/// find (a subject, an index) ends it with no change; what the operator ought to know goes to the log.
+/// All of it runs on the user interface thread.
+class VRetargetSetup : public QObject
+{
+	Q_OBJECT
+	/// Read by the preview at each drag: a bind pose is mirrored to the segment on the other side.
+	Q_PROPERTY(bool jointSymmetry READ JointSymmetry WRITE SetJointSymmetry NOTIFY jointSymmetryChanged)
+
+public:
+	/// A subject in its three forms. Null what there is not; shared, and never changed.
+	struct VSubjectValues
+	{
+		std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubject;
+		std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> m_pApplicationData;
+		std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pParametrised;
+	};
+
+	VRetargetSetup(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
+	    NVX::CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory,
+	    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory);
+	~VRetargetSetup() override;
+
+	/// Makes the target subject anew from the FBX skeleton, from the root bone on and with the target scale. Targets,
+	/// joint edits and bind poses of the one before are lost.
+	Q_INVOKABLE void CreateTargetSubject();
+	Q_INVOKABLE void LoadTargetSubjectURL(const QUrl& i_rFileURL);
+	Q_INVOKABLE void SaveTargetSubjectURL(const QUrl& i_rFileURL);
+
+	/// Ties a target segment to a source segment by the offset that they have in their bind poses: to its origin, or to
+	/// its orientation. With symmetry the pair on the other side is tied too, if both sides have one.
+	Q_INVOKABLE void AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry);
+	Q_INVOKABLE void RemoveTarget(int i_TargetIndex);
+
+	/// Gives every segment a joint; those that have one keep it.
+	Q_INVOKABLE void CreateAllJoints();
+
+	/// Takes the joints, but for the root's, from segments that carry no target; a Ball joint's pose goes into its
+	/// segment.
+	Q_INVOKABLE void RemoveUnnecessaryJoints();
+
+	/// Recalculates the offset of each target from the present bind poses.
+	Q_INVOKABLE void UpdateTargets();
+
+	bool JointSymmetry() const { return m_bJointSymmetry; }
+	void SetJointSymmetry(bool i_bJointSymmetry);
+
+	/// Reads the skeleton that CreateTargetSubject uses; no subject changes. False if the file cannot be read, then the
+	/// old skeleton stays, and if it has no skeleton.
+	bool LoadTargetFBX(const boost::filesystem::path& i_rPath);
+
+	/// False if the latest FBX file broke off and the skeleton is what was read until then.
+	bool IsTargetFBXComplete() const { return m_bTargetFBXComplete; }
+
+	/// Index into the FBX skeleton; takes effect with the next CreateTargetSubject.
+	void SetTargetRootIndex(std::uint32_t i_RootIndex);
+
+	/// Takes effect on the target subject at once. Anything but a finite number above 0 is refused, which is told.
+	void SetTargetScale(double i_Scale);
+
+	/// The present target subject's; 1 without one.
+	double GetTargetScale() const;
+
+	/// @param i_rSkinName goes into the application data.
+	/// @return false if the file cannot be read.
+	bool LoadSourceSubject(const boost::filesystem::path& i_rPath, const std::string& i_rSkinName);
+
+	/// A file of extension ".qrx", in exactly this spelling, is a legacy text file, any other a skeleton file.
+	/// @return 0; 0x80000000 for a file that cannot be read; for a legacy file also 0x8000002A if it cannot be opened
+	/// and 0x80000018 if it is of a later version.
+	std::uint32_t LoadTargetSubject(const boost::filesystem::path& i_rPath);
+
+	/// Replaces the file only when the whole of it stands on disk.
+	/// @return 0; 0x80000020 if it could not be written; 0x8000000A without a target subject.
+	std::uint32_t SaveTargetSubject(const boost::filesystem::path& i_rPath);
+
+	void SetSourceSubject(
+	    CoreOrlexTypes::VSubjectParametrised i_Parametrised, CoreOrlexTypes::VSubjectApplicationData i_ApplicationData);
+
+	/// @param i_Extras of the file that the subject comes from.
+	void SetTargetSubject(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
+	    CoreOrlexTypes::VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras = {});
+
+	/// An edit that leaves the application data and the extras as they are.
+	void SetTargetSubjectParametrised(CoreOrlexTypes::VSubjectParametrised i_Parametrised);
+
+	/// The values without copies.
+	VSubjectValues SourceValues() const { return ValuesOf(m_SourceItems); }
+	VSubjectValues TargetValues() const { return ValuesOf(m_TargetItems); }
+
+	/// Copies; false, with nothing copied, if there is none.
+	bool GetSourceTemplate(CoreOrlexTypes::VSubject& o_rSubject) const;
+	bool GetSourceSubject(CoreOrlexTypes::VSubjectParametrised& o_rSubject) const;
+	bool GetTargetTemplate(CoreOrlexTypes::VSubject& o_rSubject) const;
+	bool GetTargetSubject(CoreOrlexTypes::VSubjectParametrised& o_rSubject) const;
+	bool GetTargetSubjectAndData(CoreOrlexTypes::VSubjectParametrised& o_rSubject,
+	    CoreOrlexTypes::VSubjectApplicationData& o_rApplicationData) const;
+
+	/// What the target subject's file holds beyond the subject; empty for a subject that was made here.
+	const CoreOrlexQRTIO::VSubjectQRTExtras& GetTargetExtras() const { return m_TargetExtras; }
+
+	/// Stem of the source skeleton's file, or what the target subject's file tells of it.
+	const std::string& GetSourceName() const { return m_SourceName; }
+	std::shared_ptr<VRetargetSetupSegmentModel> GetSourceSegmentModel() const { return m_pSourceSegmentModel; }
+	std::shared_ptr<VRetargetSetupSegmentModel> GetTargetSegmentModel() const { return m_pTargetSegmentModel; }
+	std::shared_ptr<VRetargetSetupTargetModel> GetTargetModel() const { return m_pTargetModel; }
+
+	/// Null before the first FBX file, and after one without a skeleton.
+	std::shared_ptr<const FBXIO::VSkinSkeleton> GetFBXSkeleton() const { return m_pFBXSkeleton; }
+
+	/// Turns the FBX file's space into one with Z up.
+	const QMatrix4x4& GetTargetAxisMatrix() const { return m_TargetAxisMatrix; }
+
+	/// Fires at the end of every change, before LoadTargetSubject has taken over the source name: callbacks go through
+	/// a dispatcher and read what stands when they run.
+	NVX::VSignal<>& GetChangedSignal() { return m_ChangedSignal; }
+
+	/// Null before the first change.
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> GetCurrentFrame() const { return m_pFrame; }
+
+signals:
+	void jointSymmetryChanged();
+
+private:
+	struct VSubjectItems
+	{
+		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pSubject;
+		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pApplicationData;
+		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pParametrised;
+	};
+
+	static VSubjectValues ValuesOf(const VSubjectItems& i_rItems);
+
+	/// Replaces the items of one subject and publishes.
+	/// @param i_pApplicationData null keeps the item that is there.
+	/// @return false, with no change, if the host made no item.
+	bool Replace(VSubjectItems& io_rItems, std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> i_pParametrised,
+	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData);
+	void Publish();
+
+	template <typename T>
+	NVX::CountedPointer<TesselPluginInterface::IFlowItem> MakeItem(
+	    const VSubjectItems& i_rItems, const char* i_pFlowType, std::shared_ptr<const T> i_pValue);
+
+	const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
+	const NVX::CountedPointer<TesselPluginInterface::IFrameFactory> m_pFrameFactory;
+	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
+	const std::shared_ptr<VRetargetSetupSegmentModel> m_pSourceSegmentModel;
+	const std::shared_ptr<VRetargetSetupSegmentModel> m_pTargetSegmentModel;
+	const std::shared_ptr<VRetargetSetupTargetModel> m_pTargetModel;
+	std::shared_ptr<const FBXIO::VSkinSkeleton> m_pFBXSkeleton;
+	std::string m_TargetName;
+	std::string m_SourceName;
+	VSubjectItems m_SourceItems;
+	VSubjectItems m_TargetItems;
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame;
+	/// Set by nothing and read by nothing, as is the spare flag.
+	QMatrix4x4 m_SpareMatrix;
+	QMatrix4x4 m_TargetAxisMatrix;
+	std::uint32_t m_TargetRootIndex = 0;
+	double m_TargetScale = 1.0;
+	[[maybe_unused]] bool m_bSpare = false;
+	bool m_bJointSymmetry = true;
+	NVX::VSignal<> m_ChangedSignal;
+
+	CoreOrlexQRTIO::VSubjectQRTExtras m_TargetExtras;
+	bool m_bTargetFBXComplete = true;
+	/// The root bone was chosen since the FBX file was read.
+	bool m_bTargetRootChosen = false;
+};

@@ -1,0 +1,203 @@
+// The operations of VRetargetSetup that read and write files.
+
+#include "CoreOrlexQRTIO/Reader.h"
+#include "CoreOrlexQRTIO/Writer.h"
+#include "DebugServices/GlobalLog.h"
+#include "FBXIO/FBXReader.h"
+#include "NVX/Status.h"
+#include "RetargetSetupDocument/AngleAxis.h"
+#include "RetargetSetupDocument/DefaultPose.h"
+#include "RetargetSetupDocument/FilePath.h"
+#include "RetargetSetupDocument/GlobalScale.h"
+#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/LegacyText.h"
+#include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/TargetConstruction.h"
+#include "UtilsFileSystem/Paths.h"
+
+#include <algorithm>
+#include <cmath>
+#include <map>
+#include <utility>
+
+using CoreOrlexTypes::VSubjectApplicationData;
+using CoreOrlexTypes::VSubjectParametrised;
+using RetargetSetup::c_LogCategory;
+
+namespace
+{
+
+constexpr const char* c_LegacyExtension = ".qrx";
+
+/// The operator did not choose among several trees of bones, so the first is taken.
+void TellOtherRoots(const FBXIO::VSkinSkeleton& i_rSkeleton)
+{
+	const std::vector<std::size_t> roots = RetargetSetup::RootBones(i_rSkeleton);
+	if (roots.size() < 2)
+		return;
+	std::string names;
+	for (const std::size_t root : roots)
+		names += (names.empty() ? "" : "', '") + i_rSkeleton[root].m_Name;
+	NVX_LOG(c_LogCategory, NVX::ELogWarning,
+	    "The file has %1% root bones, and no root was chosen: only the first is taken, of '%2%'", roots.size(), names);
+}
+
+/// The place of the root is its bone's global matrix, which has the pre-rotation in it already.
+void TellTwiceTurnedRoot(const FBXIO::VSkinBone& i_rRoot)
+{
+	const Rotation::VVector3 preRotation = RetargetSetup::MatrixToAngleAxis(i_rRoot.m_PreRotation);
+	const auto isTurn = [](double i_Value) { return std::abs(i_Value) > 1e-6; };
+	if (std::any_of(preRotation.begin(), preRotation.end(), isTurn))
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "Root bone '%1%' has a pre-rotation, which counts twice: the bind pose differs from the pose in the file",
+		    i_rRoot.m_Name);
+}
+
+void TellNamesUsedTwice(const VSubjectParametrised& i_rSubject)
+{
+	std::map<std::string_view, std::size_t> uses;
+	for (const VSubjectParametrised::VSegment& rSegment : i_rSubject.m_Segments)
+		++uses[rSegment.m_Name];
+	for (const auto& [name, count] : uses)
+		if (count > 1)
+			NVX_LOG(c_LogCategory, NVX::ELogWarning,
+			    "%1% segments are named '%2%': when the file is read, all their targets come back on the first", count,
+			    name);
+}
+
+} // namespace
+
+bool VRetargetSetup::LoadTargetFBX(const boost::filesystem::path& i_rPath)
+{
+	FBXIO::FBXReader reader;
+	if (!reader.LoadFile(UtilsFileSystem::ToUtf8(i_rPath)))
+		return false;
+	m_bTargetFBXComplete = reader.IsComplete();
+	m_pFBXSkeleton = reader.GetSkeleton();
+	if (!m_pFBXSkeleton || m_pFBXSkeleton->empty())
+	{
+		m_pFBXSkeleton = nullptr;
+		return false;
+	}
+	m_TargetName = RetargetSetup::FileStem(i_rPath);
+	m_bTargetRootChosen = false;
+	m_TargetAxisMatrix.setToIdentity();
+	switch (reader.GetUpAxis())
+	{
+	case 0: m_TargetAxisMatrix.rotate(-90.0f, 0.0f, 1.0f, 0.0f); break;
+	case 1: m_TargetAxisMatrix.rotate(90.0f, 1.0f, 0.0f, 0.0f); break;
+	default: break;
+	}
+	return true;
+}
+
+void VRetargetSetup::CreateTargetSubject()
+{
+	if (!m_pFBXSkeleton)
+		return;
+	VSubjectParametrised subject;
+	VSubjectApplicationData applicationData;
+	subject.m_Name = RetargetSetup::c_SubjectName;
+	subject.m_SubjectId = RetargetSetup::c_SubjectId;
+	applicationData.m_SubjectId = RetargetSetup::c_SubjectId;
+	applicationData.m_Skin = m_TargetName;
+	applicationData.m_RetargetSourceTemplate = m_SourceName;
+	RetargetSetup::BuildTargetSubject(*m_pFBXSkeleton, subject, applicationData, m_TargetRootIndex);
+	RetargetSetup::SetGlobalScale(subject, m_TargetScale);
+	if (subject.m_Segments.empty())
+	{
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The FBX skeleton has no bone %1% to begin with: nothing is made",
+		    m_TargetRootIndex);
+		return;
+	}
+	const FBXIO::VSkinBone& rRootBone = (*m_pFBXSkeleton)[m_TargetRootIndex];
+	if (!m_bTargetRootChosen)
+		TellOtherRoots(*m_pFBXSkeleton);
+	TellTwiceTurnedRoot(rRootBone);
+
+	const QMatrix4x4 world = m_TargetAxisMatrix * rRootBone.m_Global;
+	const std::optional<Rotation::VVector3> rotation = RetargetSetup::RotationOf(world);
+	if (!rotation)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "The place of root bone '%1%' is no rotation (negative or sheared scale): it is lost and counts as none",
+		    rRootBone.m_Name);
+	VSubjectParametrised::VJoint& rJoint = subject.m_Segments.front().m_Joint;
+	rJoint.m_BindPose.assign(6, 0.0);
+	if (rotation)
+		std::copy(rotation->begin(), rotation->end(), rJoint.m_BindPose.begin());
+	for (int row = 0; row < 3; ++row)
+		rJoint.m_BindPose[std::size_t(3 + row)] = double(world(row, 3));
+	rJoint.m_Mean = rJoint.m_BindPose;
+	SetTargetSubject(std::move(subject), std::move(applicationData));
+}
+
+bool VRetargetSetup::LoadSourceSubject(const boost::filesystem::path& i_rPath, const std::string& i_rSkinName)
+{
+	VSubjectParametrised subject;
+	VSubjectApplicationData applicationData;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras;
+	if (!CoreOrlexQRTIO::VReader().Read(
+	        i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId, subject, applicationData, extras))
+		return false;
+	applicationData.m_Skin = i_rSkinName;
+	if (RetargetSetup::LacksBindPose(subject))
+	{
+		RetargetSetup::ApplyDefaultPose(subject);
+		RetargetSetup::AdoptTPoseAsBindPose(subject);
+	}
+	std::string sourceName = std::exchange(m_SourceName, RetargetSetup::FileStem(i_rPath));
+	if (Replace(m_SourceItems, std::make_shared<const VSubjectParametrised>(std::move(subject)),
+	        std::make_shared<const VSubjectApplicationData>(std::move(applicationData))))
+		return true;
+	m_SourceName = std::move(sourceName);
+	return false;
+}
+
+std::uint32_t VRetargetSetup::LoadTargetSubject(const boost::filesystem::path& i_rPath)
+{
+	CoreOrlexTypes::VSubjectRecord record;
+	VSubjectParametrised& rSubject = record.m_SubjectParametrised;
+	VSubjectApplicationData& rApplicationData = record.m_SubjectApplicationData;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras;
+	if (RetargetSetup::FileExtension(i_rPath) == c_LegacyExtension)
+	{
+		if (const std::uint32_t status = RetargetSetup::ReadLegacyFile(i_rPath, record))
+			return status;
+	}
+	else if (!CoreOrlexQRTIO::VReader().Read(
+	             i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId, rSubject, rApplicationData, extras))
+		return NVX::Status::c_Failure;
+	if (RetargetSetup::LacksBindPose(rSubject))
+		RetargetSetup::AdoptTPoseAsBindPose(rSubject);
+	std::string sourceName = rApplicationData.m_RetargetSourceTemplate;
+	if (!Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(rSubject)),
+	        std::make_shared<const VSubjectApplicationData>(std::move(rApplicationData))))
+		return NVX::Status::c_Failure;
+	m_TargetExtras = std::move(extras);
+	m_SourceName = std::move(sourceName);
+	return NVX::Status::c_Success;
+}
+
+std::uint32_t VRetargetSetup::SaveTargetSubject(const boost::filesystem::path& i_rPath)
+{
+	const VSubjectValues target = TargetValues();
+	if (!target.m_pParametrised || !target.m_pApplicationData)
+		return NVX::Status::c_NothingToActOn;
+	TellNamesUsedTwice(*target.m_pParametrised);
+	return CoreOrlexQRTIO::VWriter().Write(i_rPath, *target.m_pParametrised, *target.m_pApplicationData, m_TargetExtras,
+	    CoreOrlexQRTIO::c_AutomaticVersion);
+}
+
+void VRetargetSetup::LoadTargetSubjectURL(const QUrl& i_rFileURL)
+{
+	const boost::filesystem::path path = RetargetSetup::PathFromUrl(i_rFileURL);
+	if (!path.empty())
+		LoadTargetSubject(path);
+}
+
+void VRetargetSetup::SaveTargetSubjectURL(const QUrl& i_rFileURL)
+{
+	const boost::filesystem::path path = RetargetSetup::PathFromUrl(i_rFileURL);
+	if (!path.empty())
+		SaveTargetSubject(path);
+}

@@ -1,0 +1,150 @@
+// The commands of VRetargetSetup that edit targets and joints.
+
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupDocument/BindPose.h"
+#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/Joints.h"
+#include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/RetargetTargets.h"
+
+#include <cmath>
+
+using ComputeSubject::VComputeSubjectFK;
+using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectApplicationData;
+using CoreOrlexTypes::VSubjectParametrised;
+using RetargetSetup::c_LogCategory;
+
+namespace
+{
+
+/// Both subjects at rest in their bind poses.
+struct VPrepared
+{
+	std::unique_ptr<VComputeSubjectFK> m_pSourceFK;
+	std::unique_ptr<VComputeSubjectFK> m_pTargetFK;
+
+	explicit operator bool() const { return m_pSourceFK && m_pTargetFK; }
+};
+
+VPrepared Prepare(const VRetargetSetup::VSubjectValues& i_rSource, const VRetargetSetup::VSubjectValues& i_rTarget)
+{
+	if (!i_rTarget.m_pParametrised || !i_rTarget.m_pApplicationData || !i_rTarget.m_pSubject
+	    || !i_rSource.m_pParametrised || !i_rSource.m_pSubject)
+		return {};
+	return {RetargetSetup::KinematicsInBindPose(*i_rSource.m_pParametrised, *i_rSource.m_pSubject, "source"),
+	    RetargetSetup::KinematicsInBindPose(*i_rTarget.m_pParametrised, *i_rTarget.m_pSubject, "target")};
+}
+
+void TellNoPartner(const VSubjectParametrised& i_rSubject, std::size_t i_SegmentIndex, const char* i_pWhich)
+{
+	NVX_LOG(c_LogCategory, NVX::ELogWarning,
+	    "Segment '%1%' of the %2% subject has no partner on the other side: no mirrored target is added",
+	    i_rSubject.m_Segments[i_SegmentIndex].m_Name, i_pWhich);
+}
+
+void TellChangedPose(const VComputeSubjectFK& i_rBefore, const VSubjectParametrised& i_rAfter)
+{
+	VSubject subject;
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(i_rAfter, subject);
+	const auto pAfter = RetargetSetup::KinematicsInBindPose(i_rAfter, subject, "target");
+	if (!pAfter)
+		return;
+	const auto worst = RetargetSetup::WorstPoseDifference(
+	    RetargetSetup::SegmentPoses(i_rBefore), RetargetSetup::SegmentPoses(*pAfter));
+	if (worst)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "Removing joints changed the bind pose: segment '%1%' most, by %2$.1f mm and %3$.2f degrees",
+		    i_rAfter.m_Segments[worst->m_SegmentIndex].m_Name, worst->m_Distance, worst->m_Angle * 180.0 / M_PI);
+}
+
+} // namespace
+
+void VRetargetSetup::AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry)
+{
+	const VSubjectValues source = SourceValues();
+	const VSubjectValues target = TargetValues();
+	const auto sourceIndex = std::uint32_t(i_SourceSegmentIndex);
+	const auto targetIndex = std::uint32_t(i_TargetSegmentIndex);
+	if (!source.m_pParametrised || sourceIndex >= source.m_pParametrised->m_Segments.size() || !target.m_pParametrised
+	    || targetIndex >= target.m_pParametrised->m_Segments.size())
+		return;
+	const VPrepared prepared = Prepare(source, target);
+	if (!prepared)
+		return;
+
+	VSubjectParametrised subject = *target.m_pParametrised;
+	VSubjectApplicationData applicationData = *target.m_pApplicationData;
+	const auto addPair = [&](std::size_t i_Source, std::size_t i_Target)
+	{
+		RetargetSetup::AddTargetPair(*prepared.m_pSourceFK, *prepared.m_pTargetFK, i_Source, i_Target, i_bPosition,
+		    *source.m_pParametrised, subject, applicationData);
+	};
+	addPair(sourceIndex, targetIndex);
+	if (i_bSymmetry)
+	{
+		const std::int32_t sourceMirror = RetargetSetup::FindMirrorSegment(*source.m_pParametrised, sourceIndex);
+		const std::int32_t targetMirror = RetargetSetup::FindMirrorSegment(subject, targetIndex);
+		if (sourceMirror == -1)
+			TellNoPartner(*source.m_pParametrised, sourceIndex, "source");
+		if (targetMirror == -1)
+			TellNoPartner(subject, targetIndex, "target");
+		if (sourceMirror != -1 && targetMirror != -1)
+			addPair(std::size_t(sourceMirror), std::size_t(targetMirror));
+	}
+	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)),
+	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)));
+}
+
+void VRetargetSetup::RemoveTarget(int i_TargetIndex)
+{
+	VSubjectParametrised subject;
+	VSubjectApplicationData applicationData;
+	if (!GetTargetSubjectAndData(subject, applicationData) || std::uint32_t(i_TargetIndex) >= subject.m_Targets.size())
+		return;
+	RetargetSetup::RemoveTarget(subject, applicationData, std::uint32_t(i_TargetIndex));
+	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)),
+	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)));
+}
+
+void VRetargetSetup::UpdateTargets()
+{
+	const VSubjectValues source = SourceValues();
+	const VSubjectValues target = TargetValues();
+	const VPrepared prepared = Prepare(source, target);
+	if (!prepared)
+		return;
+	VSubjectParametrised subject = *target.m_pParametrised;
+	RetargetSetup::UpdateTargetStates(*prepared.m_pSourceFK, *prepared.m_pTargetFK, *source.m_pParametrised, subject);
+	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)), target.m_pApplicationData);
+}
+
+void VRetargetSetup::CreateAllJoints()
+{
+	const VSubjectValues target = TargetValues();
+	if (!target.m_pParametrised || !target.m_pApplicationData)
+		return;
+	VSubjectParametrised subject = *target.m_pParametrised;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
+	RetargetSetup::EnableAllJoints(subject, extras);
+	if (Replace(
+	        m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)), target.m_pApplicationData))
+		m_TargetExtras = std::move(extras);
+}
+
+void VRetargetSetup::RemoveUnnecessaryJoints()
+{
+	const VSubjectValues target = TargetValues();
+	if (!target.m_pParametrised || !target.m_pApplicationData || !target.m_pSubject)
+		return;
+	VSubjectParametrised subject = *target.m_pParametrised;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
+	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
+	if (const auto pBefore = RetargetSetup::KinematicsInBindPose(*target.m_pParametrised, *target.m_pSubject, "target"))
+		TellChangedPose(*pBefore, subject);
+	if (Replace(
+	        m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)), target.m_pApplicationData))
+		m_TargetExtras = std::move(extras);
+}
