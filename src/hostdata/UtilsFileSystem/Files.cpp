@@ -22,6 +22,11 @@ using boost::system::error_code;
 
 constexpr std::size_t c_FullBufferBytes = 0x800000;
 
+std::string RuntimeErrorText(int i_Error)
+{
+	return boost::system::generic_category().message(i_Error);
+}
+
 bool WritesOnly(const char* i_pMode)
 {
 	return std::strchr(i_pMode, 'r') == nullptr;
@@ -67,7 +72,7 @@ std::uint32_t ReadWholeFile(
 	int error = 0;
 	const VFile pFile = OpenFile(i_rPath, "rb", error);
 	if (!pFile)
-		return fail(NVX::Status::c_FileNotOpened, Platform::ErrorText(error));
+		return fail(NVX::Status::c_FileNotOpened, RuntimeErrorText(error));
 
 	// The size is a guess only: pipes have none, and a file may grow.
 	error_code sizeError;
@@ -88,7 +93,7 @@ std::uint32_t ReadWholeFile(
 		o_rBytes.resize(std::min(read + std::max(read, c_Step), i_MaximumBytes + 1));
 	}
 	if (std::ferror(pFile.get()))
-		return fail(NVX::Status::c_Failure, Platform::ErrorText(errno));
+		return fail(NVX::Status::c_Failure, RuntimeErrorText(errno));
 	o_rBytes.resize(read);
 	return NVX::Status::c_Success;
 }
@@ -135,10 +140,15 @@ std::uint32_t CreateDirectories(const path& i_rPath)
 	return NVX::Status::c_Success;
 }
 
-bool SetFullBuffering(std::FILE* i_pFile, const path& i_rPath)
+bool SetFullBuffering(VFile& io_rFile, const path& i_rPath)
 {
-	if (i_pFile && std::setvbuf(i_pFile, nullptr, _IOFBF, c_FullBufferBytes) == 0)
+	// A size alone is only a wish that C libraries do not all grant: the buffer is ours.
+	std::unique_ptr<char[]> pBuffer(new char[c_FullBufferBytes]);
+	if (io_rFile && std::setvbuf(io_rFile.get(), pBuffer.get(), _IOFBF, c_FullBufferBytes) == 0)
+	{
+		io_rFile.get_deleter().m_pBuffer = std::move(pBuffer);
 		return true;
+	}
 	NVX_LOG("System", NVX::ELogError, "Failed to enable full buffering for file stream %1%.", ToUtf8(i_rPath));
 	return false;
 }

@@ -14,6 +14,8 @@ namespace UtilsFileSystem
 struct VCloseFile
 {
 	void operator()(std::FILE* i_pFile) const { std::fclose(i_pFile); }
+	/// What SetFullBuffering gave to the file: it must outlive it.
+	std::unique_ptr<char[]> m_pBuffer;
 };
 using VFile = std::unique_ptr<std::FILE, VCloseFile>;
 
@@ -39,7 +41,7 @@ std::uint32_t CreateDirectories(const boost::filesystem::path& i_rPath);
 
 /// Gives a file that was just opened a buffer of 8 MiB that is written only when full.
 /// @param i_rPath for the message.
-bool SetFullBuffering(std::FILE* i_pFile, const boost::filesystem::path& i_rPath);
+bool SetFullBuffering(VFile& io_rFile, const boost::filesystem::path& i_rPath);
 
 /// Logs why an open failed: who holds the file, if that is the reason and the system can tell, otherwise the error.
 /// @param i_pLockedMessage with %1% for the path and %2% for the names.

@@ -17,11 +17,13 @@ namespace UtilsFileSystem::Platform
 
 std::shared_ptr<IProcessTable> GetProcessTable();
 
+/// The path in the form that the system's calls take at any length.
+boost::filesystem::path::string_type NativePath(const boost::filesystem::path& i_rPath);
+
 /// @return null with o_rError set. A directory is refused.
 std::FILE* Open(const boost::filesystem::path& i_rPath, const char* i_pMode, int& o_rError);
 /// True if the error of an open that just failed on this thread means that another process holds the file.
 bool IsSharingViolation(int i_Error);
-bool IsDirectory(std::FILE* i_pFile);
 
 /// A file that is mapped in views.
 struct VMapped
@@ -41,7 +43,7 @@ void UnmapView(void* i_pView, std::size_t i_Length);
 void CloseMapped(VMapped& io_rMapped);
 std::size_t GetMappingGranularity();
 
-/// @name Parts of a save. Each returns 0 or an error of the system for ErrorText, and tells no one.
+/// @name Parts of a save. Each returns 0 or an error of the system, which is not errno everywhere, for ErrorText.
 /// @{
 /// Makes a file that was not there, with the rights and owner of i_pModel if given, writes all bytes and waits until
 /// they are on the disk. On failure the new file is gone.

@@ -226,11 +226,17 @@ std::shared_ptr<IProcessTable> GetProcessTable()
 	return std::make_shared<VProcessTable>();
 }
 
+boost::filesystem::path::string_type NativePath(const boost::filesystem::path& i_rPath)
+{
+	return i_rPath.native();
+}
+
 std::FILE* Open(const boost::filesystem::path& i_rPath, const char* i_pMode, int& o_rError)
 {
 	std::FILE* const pFile = std::fopen(i_rPath.c_str(), i_pMode);
 	o_rError = pFile ? 0 : errno;
-	if (!pFile || !IsDirectory(pFile))
+	struct stat about = {};
+	if (!pFile || ::fstat(::fileno(pFile), &about) != 0 || !S_ISDIR(about.st_mode))
 		return pFile;
 	std::fclose(pFile);
 	o_rError = EISDIR;
@@ -240,12 +246,6 @@ std::FILE* Open(const boost::filesystem::path& i_rPath, const char* i_pMode, int
 bool IsSharingViolation(int i_Error)
 {
 	return i_Error == EBUSY || i_Error == ETXTBSY || i_Error == EAGAIN;
-}
-
-bool IsDirectory(std::FILE* i_pFile)
-{
-	struct stat file = {};
-	return ::fstat(::fileno(i_pFile), &file) == 0 && S_ISDIR(file.st_mode);
 }
 
 int OpenMapped(const boost::filesystem::path& i_rPath, bool i_bWrite, std::uint64_t i_Size, VMapped& o_rMapped)
