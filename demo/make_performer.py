@@ -36,7 +36,7 @@ POSITION_VARIANCE = 1e8
 
 class Segment:
     """offset is the place in the parent's frame, as expressions; orientation an angle-axis. bind is the joint's state
-    in the pose in which the performer is related to a character. centre and spread give the range of a limited joint."""
+    in the pose in which the performer is related to a character. centre and spread bound a limited joint."""
 
     def __init__(self, name, parent, joint, offset, bind=None, orientation="0 0 0", axes=None, centre=None, spread=None,
                  mass=None, mass_centre=None, gyration=None, style="tetra-stripe", labels=None):
