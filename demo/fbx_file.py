@@ -123,9 +123,9 @@ def binary(elements, version):
     for element in elements:
         _append_binary_record(out, element, head)
     out += bytes(head.size + 1)
-    out += FOOTER_ID + bytes(4)
+    out += FOOTER_ID
     out += bytes(16 - len(out) % 16)
-    out += struct.pack("<I", version) + bytes(120) + FOOTER_MAGIC
+    out += bytes(4) + struct.pack("<I", version) + bytes(120) + FOOTER_MAGIC
     return bytes(out)
 
 

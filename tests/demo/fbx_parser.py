@@ -81,7 +81,7 @@ def parse_binary(data):
             break
         records.append(record)
     footer = data[at + 16:]
-    padding = 4 + 16 - (at + 16 + 4) % 16
+    padding = 16 - (at + 16) % 16 + 4
     require(footer[:padding] == bytes(padding), "padding of the footer")
     require(struct.unpack_from("<I", footer, padding)[0] == version, "version in the footer")
     require(footer[padding + 4:] == bytes(120) + FOOTER_MAGIC, "end of the footer")
