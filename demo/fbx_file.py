@@ -9,7 +9,7 @@ An element has a name, properties and child elements. The Python type of a prope
     str          S   UTF-8 text
     ObjectName   S   name and class, joined as each form of the format wants it
     bytes        R   raw bytes (left out in ASCII)
-    array.array  d, i or q: an array of 64-bit floats, 32-bit or 64-bit integers
+    array.array  an array of 64-bit or 32-bit floats (typecodes d, f) or of 32-bit or 64-bit integers (i, q)
 
 Output depends on the tree alone: no clock, no random numbers.
 """
@@ -92,7 +92,7 @@ def _binary_property(value):
     if isinstance(value, bytes):
         return b"R" + struct.pack("<I", len(value)) + value
     if isinstance(value, array.array):
-        code = {"d": b"d", "i": b"i", "q": b"l"}[value.typecode]
+        code = {"d": b"d", "f": b"f", "i": b"i", "q": b"l"}[value.typecode]
         data = _little_endian(value)
         if len(data) < COMPRESS_FROM_BYTES:
             return code + struct.pack("<III", len(value), 0, len(data)) + data

@@ -10,6 +10,7 @@ for the attribute kind Root). The same call always gives the same bytes.
 """
 
 import argparse
+import array
 import json
 import pathlib
 import sys
@@ -19,7 +20,7 @@ sys.path.insert(0, str(HERE.parents[2] / "demo"))
 
 import fbx_file
 import fbx_scene
-from fbx_file import Int64, ObjectName, doubles, integers
+from fbx_file import Int64, ObjectName, integers
 from fbx_scene import branch, node, prop
 from transforms import Node
 
@@ -294,8 +295,8 @@ def animation(bone_id):
         branch("AnimationCurveNode", Int64(channel), ObjectName("R", "AnimCurveNode"), "", children=[
             fbx_scene.properties(prop("d|X", "number", 90), prop("d|Y", "number", 0), prop("d|Z", "number", 0))]),
         branch("AnimationCurve", Int64(curve), ObjectName("", "AnimCurve"), "", children=[
-            node("Default", 90.0), node("KeyVer", 4008), node("KeyTime", fbx_file.array.array("q", times)),
-            node("KeyValueFloat", doubles([90.0, 90.0])), node("KeyAttrFlags", integers([8456])),
+            node("Default", 90.0), node("KeyVer", 4008), node("KeyTime", array.array("q", times)),
+            node("KeyValueFloat", array.array("f", [90.0, 90.0])), node("KeyAttrFlags", integers([8456])),
             node("KeyAttrRefCount", integers([2]))]),
     ]
     links = [node("C", "OO", Int64(stack), Int64(0)), node("C", "OO", Int64(layer), Int64(stack)),
