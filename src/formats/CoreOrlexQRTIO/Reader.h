@@ -20,6 +20,8 @@ class VReader
 {
 public:
 	/// Warnings and errors go to the log category "QRTIO". On false the outputs are empty or partly filled.
+	/// @param i_SubjectId c_HashedIds makes the ids of subject, markers and rotations hashes of their names; with any
+	/// other id those of markers and rotations are counts.
 	bool Read(const boost::filesystem::path& i_rPath, const std::string& i_rSubjectName, std::uint32_t i_SubjectId,
 	    CoreOrlexTypes::VSubjectParametrised& o_rSubject, CoreOrlexTypes::VSubjectApplicationData& o_rApplicationData,
 	    VSubjectQRTExtras& o_rExtras);
@@ -29,7 +31,15 @@ public:
 	    CoreOrlexTypes::VSubjectParametrised& o_rSubject, CoreOrlexTypes::VSubjectApplicationData& o_rApplicationData,
 	    VSubjectQRTExtras& o_rExtras, std::vector<std::string>& o_rErrors, std::vector<std::string>& o_rWarnings);
 
-	/// Writes the generated XML schema of the format. False if the file could not be written.
+	/// The same from the bytes of a file.
+	bool ReadText(std::string i_Text, const std::string& i_rSubjectName, std::uint32_t i_SubjectId,
+	    CoreOrlexTypes::VSubjectParametrised& o_rSubject, CoreOrlexTypes::VSubjectApplicationData& o_rApplicationData,
+	    VSubjectQRTExtras& o_rExtras, std::vector<std::string>& o_rErrors, std::vector<std::string>& o_rWarnings);
+
+	/// The XML schema of the format, generated from the same functions that read.
+	std::string SchemaText();
+
+	/// Writes the schema to a file. False, with the reason in the log category "QRTIO", if that failed.
 	bool WriteSchema(const boost::filesystem::path& i_rPath);
 };
 

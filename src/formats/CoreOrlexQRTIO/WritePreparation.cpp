@@ -1,0 +1,196 @@
+#include "CoreOrlexQRTIO/WritePreparation.h"
+
+#include "CoreOrlexQRTIO/Evaluation.h"
+#include "CoreOrlexQRTIO/Format.h"
+#include "CoreOrlexQRTIO/Limits.h"
+#include "CoreOrlexTypes/JointType.h"
+#include "math/NumberText.h"
+
+#include <boost/format.hpp>
+
+#include <algorithm>
+
+namespace CoreOrlexQRTIO
+{
+namespace
+{
+
+using CoreOrlexTypes::VSubjectParametrised;
+using VTexts = std::vector<std::string>;
+using VJoint = VSubjectParametrised::VJoint;
+
+/// Children and roots, if every segment can be reached from a root within the depth that a file holds.
+bool PrepareTree(VWriting& io_rWriting, VTexts& io_rErrors)
+{
+	const auto& rSegments = io_rWriting.m_rSubject.m_Segments;
+	for (std::uint32_t i = 0; i < rSegments.size(); ++i)
+	{
+		const std::uint32_t parent = rSegments[i].m_ParentSegmentIndex;
+		if (parent == CoreOrlexTypes::c_NoParent)
+			io_rWriting.m_Roots.push_back(i);
+		else if (parent < rSegments.size())
+			io_rWriting.m_Segments[parent].m_Children.push_back(i);
+	}
+	std::size_t reached = 0;
+	std::size_t depth = 0;
+	std::vector<std::uint32_t> level = io_rWriting.m_Roots;
+	for (; !level.empty(); ++depth)
+	{
+		reached += level.size();
+		std::vector<std::uint32_t> next;
+		for (const std::uint32_t index : level)
+		{
+			const std::vector<std::uint32_t>& rChildren = io_rWriting.m_Segments[index].m_Children;
+			next.insert(next.end(), rChildren.begin(), rChildren.end());
+		}
+		level = std::move(next);
+	}
+	if (reached != rSegments.size())
+		io_rErrors.push_back(
+		    (boost::format(
+		         "%1% segments cannot be reached from a root: their parents are missing or go round in a ring.")
+		        % (rSegments.size() - reached))
+		        .str());
+	else if (depth > c_MaximumSegmentDepth)
+		io_rErrors.push_back((boost::format("A chain of %1% segments is longer than a file can hold, which is %2%.")
+		    % depth % c_MaximumSegmentDepth)
+		                         .str());
+	else
+		return true;
+	return false;
+}
+
+bool Evaluate(VWriting& io_rWriting, std::span<const std::string> i_Expressions, Rotation::VVector3& o_rValues,
+    VTexts& io_rErrors)
+{
+	std::string error;
+	bool bFine = true;
+	for (std::size_t i = 0; i < 3; ++i)
+		if (!io_rWriting.m_rParser.Evaluate(i_Expressions[i], o_rValues[i], error))
+		{
+			io_rErrors.push_back(error);
+			bFine = false;
+		}
+	return bFine;
+}
+
+VTexts Printed(const Rotation::VVector3& i_rVector)
+{
+	VTexts texts(3);
+	std::ranges::transform(i_rVector, texts.begin(), NumberText::PrintG17);
+	return texts;
+}
+
+/// What files up to 3.1 hold of the segment's pose in the joint's frame: as it was read, if that still yields what the
+/// segment holds.
+void PreparePost(
+    VWriting& io_rWriting, const VSubjectParametrised::VSegment& i_rSegment, VSubjectQRTExtras::VJoint& io_rExtras)
+{
+	const std::optional<VJointPose> post = PostPose(io_rWriting.m_rParser, io_rExtras);
+	const VJointPose held{i_rSegment.m_InversePostRotation, i_rSegment.m_InversePostTranslation};
+	if (post && Inverse(*post) == held)
+		return;
+	const VJointPose computed = Inverse(held);
+	io_rExtras.m_PostOrientation = Printed(computed.m_Rotation);
+	io_rExtras.m_PostPosition = Printed(computed.m_Translation);
+	io_rExtras.m_TemplatePostOrientation.assign(computed.m_Rotation.begin(), computed.m_Rotation.end());
+	io_rExtras.m_TemplatePostPosition.assign(computed.m_Translation.begin(), computed.m_Translation.end());
+}
+
+/// The axes as they were read, if they still yield the orientation that the joint holds.
+void PrepareAxes(const VJoint& i_rJoint, VPreparedSegment& io_rPrepared)
+{
+	if (AxesSize(i_rJoint.m_JointType) == 0)
+		return;
+	Rotation::VVector3 orientation{};
+	const std::vector<double>& rRead = io_rPrepared.m_Extras.m_Joint.m_Axis;
+	if (JointOrientation(i_rJoint.m_JointType, rRead, io_rPrepared.m_PrePose, orientation) == EAxesResult::Fine
+	    && orientation == i_rJoint.m_JointOrientation)
+		io_rPrepared.m_Axes = rRead;
+	else
+		io_rPrepared.m_Axes =
+		    AxesOfOrientation(i_rJoint.m_JointOrientation, i_rJoint.m_JointType == VJoint::EHardySpicer);
+}
+
+/// Shares the T-pose constraints out: to the joints that had a share in the file, or to all.
+void PrepareT(VWriting& io_rWriting)
+{
+	const std::vector<double>& rConstraints = io_rWriting.m_rSubject.m_TPoseConstraints;
+	const auto& rSegments = io_rWriting.m_rSubject.m_Segments;
+	std::size_t sizeOfAll = 0;
+	std::size_t sizeAsRead = 0;
+	for (std::size_t i = 0; i < rSegments.size(); ++i)
+	{
+		const std::size_t size = CoreOrlexTypes::StateSize(rSegments[i].m_Joint.m_JointType);
+		sizeOfAll += size;
+		if (io_rWriting.m_Segments[i].m_Extras.m_Joint.m_bHasT)
+			sizeAsRead += size;
+	}
+	const bool bAsRead = rConstraints.size() == sizeAsRead;
+	if (!bAsRead && rConstraints.size() != sizeOfAll)
+	{
+		if (!rConstraints.empty())
+			io_rWriting.m_Warnings.push_back((
+			    boost::format("The %1% T-pose constraints do not fit the %2% degrees of freedom of the joints: none is "
+			                  "written.")
+			    % rConstraints.size() % sizeOfAll)
+			                                     .str());
+		return;
+	}
+	std::span<const double> rest = rConstraints;
+	for (std::size_t i = 0; i < rSegments.size(); ++i)
+		if (!bAsRead || io_rWriting.m_Segments[i].m_Extras.m_Joint.m_bHasT)
+		{
+			const std::size_t size = CoreOrlexTypes::StateSize(rSegments[i].m_Joint.m_JointType);
+			io_rWriting.m_Segments[i].m_T = rest.first(size);
+			rest = rest.subspan(size);
+		}
+}
+
+} // namespace
+
+bool Prepare(VWriting& io_rWriting, VTexts& io_rErrors)
+{
+	const VSubjectParametrised& rSubject = io_rWriting.m_rSubject;
+	if (!io_rWriting.m_rParser.Initialise(rSubject, io_rErrors))
+		return false;
+	io_rWriting.m_Segments.resize(rSubject.m_Segments.size());
+	if (!PrepareTree(io_rWriting, io_rErrors))
+		return false;
+	bool bFine = true;
+	VRecordsByName<VSubjectQRTExtras::VSegment> extras(io_rWriting.m_rExtras.m_Segments);
+	for (std::size_t i = 0; i < rSubject.m_Segments.size(); ++i)
+	{
+		const VSubjectParametrised::VSegment& rSegment = rSubject.m_Segments[i];
+		VPreparedSegment& rPrepared = io_rWriting.m_Segments[i];
+		if (const VSubjectQRTExtras::VSegment* const pRead = extras.Find(i, rSegment.m_Name))
+			rPrepared.m_Extras = *pRead;
+		bFine &= Evaluate(io_rWriting, rSegment.m_PreRotation, rPrepared.m_PrePose.m_Rotation, io_rErrors);
+		bFine &= Evaluate(io_rWriting, rSegment.m_PreTranslation, rPrepared.m_PrePose.m_Translation, io_rErrors);
+		if (io_rWriting.m_Version < Format::c_3_2)
+			PreparePost(io_rWriting, rSegment, rPrepared.m_Extras.m_Joint);
+		PrepareAxes(rSegment.m_Joint, rPrepared);
+	}
+	PrepareT(io_rWriting);
+	for (std::uint32_t i = 0; i < rSubject.m_Segments.size(); ++i)
+		io_rWriting.m_FirstSegments.emplace(rSubject.m_Segments[i].m_Name, i);
+	for (std::uint32_t i = 0; i < rSubject.m_Markers.size(); ++i)
+		io_rWriting.m_FirstMarkers.emplace(rSubject.m_Markers[i].m_Name, i);
+	return bFine;
+}
+
+std::vector<std::string> WritableExpressions(VWriting& io_rWriting, std::span<const std::string> i_Expressions)
+{
+	VTexts texts(i_Expressions.begin(), i_Expressions.end());
+	if (!io_rWriting.m_Version.IsSet() || io_rWriting.m_Version >= Format::c_2_0
+	    || io_rWriting.m_rSubject.m_StaticParameters.empty())
+		return texts;
+	double value = 0.0;
+	std::string error;
+	for (std::string& rText : texts)
+		if (!NumberText::ScanWholeReal(rText, value) && io_rWriting.m_rParser.Evaluate(rText, value, error))
+			rText = NumberText::PrintG17(value);
+	return texts;
+}
+
+} // namespace CoreOrlexQRTIO
