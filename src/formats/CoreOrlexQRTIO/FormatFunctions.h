@@ -27,12 +27,12 @@ struct VReading
 	/// 1.0 in a file that does not tell.
 	Format::VVersion m_Version = Format::c_1_0;
 	std::size_t m_ModelCount = 0;
-	VIndexByName m_SegmentsByName;
-	VIndexByName m_MarkersByName;
-	VIndexByName m_RotationsByName;
-	VIndexByName m_JointsByName;
-	std::unordered_set<std::uint32_t> m_MarkerIds;
-	std::unordered_set<std::uint32_t> m_RotationIds;
+	VIndexByName m_SegmentsByName{};
+	VIndexByName m_MarkersByName{};
+	VIndexByName m_RotationsByName{};
+	VIndexByName m_JointsByName{};
+	std::unordered_set<std::uint32_t> m_MarkerIds{};
+	std::unordered_set<std::uint32_t> m_RotationIds{};
 };
 
 /// A segment while its element is read.

@@ -40,7 +40,11 @@ std::string AllVersionTexts()
 {
 	std::string texts;
 	for (const VVersionValue& rEntry : c_Versions)
-		texts += (texts.empty() ? "" : " ") + ToText(rEntry.m_Version);
+	{
+		if (!texts.empty())
+			texts += ' ';
+		texts += ToText(rEntry.m_Version);
+	}
 	return texts;
 }
 

@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <cmath>
 #include <optional>
+#include <span>
 #include <unordered_map>
 
 namespace CoreOrlexQRTIO

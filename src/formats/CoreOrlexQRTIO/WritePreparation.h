@@ -65,12 +65,12 @@ struct VWriting
 	CoreOrlexTypesUtils::VDynamicExpressionParserSimple& m_rParser;
 	/// Unset: everything is written.
 	UtilsRapidXml::VVersion m_Version;
-	std::vector<std::string> m_Warnings;
-	std::vector<VPreparedSegment> m_Segments;
+	std::vector<std::string> m_Warnings{};
+	std::vector<VPreparedSegment> m_Segments{};
 	/// Where a name stands first, which is what a reference to it finds.
-	std::unordered_map<std::string_view, std::uint32_t> m_FirstSegments;
-	std::unordered_map<std::string_view, std::uint32_t> m_FirstMarkers;
-	std::vector<std::uint32_t> m_Roots;
+	std::unordered_map<std::string_view, std::uint32_t> m_FirstSegments{};
+	std::unordered_map<std::string_view, std::uint32_t> m_FirstMarkers{};
+	std::vector<std::uint32_t> m_Roots{};
 };
 
 /// Evaluates expressions and finds what belongs to each segment.

@@ -89,7 +89,11 @@ void WriteSubspace(VWriterNode& io_rNode, const VSubjectQRTExtras::VDynamicSubsp
 	WriteText(io_rNode, Table::c_Version, i_rSubspace.m_Version);
 	std::string names;
 	for (const std::string& rName : i_rSubspace.m_JointNames)
-		names += (names.empty() ? "" : " ") + rName;
+	{
+		if (!names.empty())
+			names += ' ';
+		names += rName;
+	}
 	WriteText(io_rNode, Table::c_JointNames, names);
 	WriteReals(io_rNode, Table::c_JointParamsMean, i_rSubspace.m_JointParamsMean);
 	for (const VSubjectQRTExtras::VPrincipalComponent& rComponent : i_rSubspace.m_Components)
