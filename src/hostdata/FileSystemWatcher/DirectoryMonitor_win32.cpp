@@ -1,0 +1,213 @@
+#define NOMINMAX
+#define WIN32_LEAN_AND_MEAN
+#include <windows.h>
+
+#include "FileSystemWatcher/DirectoryMonitor.h"
+
+#include <boost/filesystem/operations.hpp>
+#include <boost/system/system_error.hpp>
+
+#include <iterator>
+#include <map>
+#include <mutex>
+
+namespace FileSystemWatcher
+{
+namespace
+{
+
+/// All that may change: names, attributes, sizes, times, security.
+constexpr DWORD c_AllChanges = 511;
+/// Ends the wait; watches count from 1.
+constexpr ULONG_PTR c_StopKey = 0;
+
+[[noreturn]] void Throw()
+{
+	throw boost::system::system_error(int(::GetLastError()), boost::system::system_category(), c_pMonitorFailure);
+}
+
+std::string ErrorText(DWORD i_Error)
+{
+	return boost::system::system_category().message(int(i_Error));
+}
+
+std::string ToUtf8(const wchar_t* i_pText, int i_Length)
+{
+	const int size = ::WideCharToMultiByte(CP_UTF8, 0, i_pText, i_Length, nullptr, 0, nullptr, nullptr);
+	std::string text(size, '\0');
+	::WideCharToMultiByte(CP_UTF8, 0, i_pText, i_Length, text.data(), size, nullptr, nullptr);
+	return text;
+}
+
+/// A directory with the read that the system holds on its buffer.
+struct VRead
+{
+	~VRead()
+	{
+		if (m_Directory != INVALID_HANDLE_VALUE)
+			::CloseHandle(m_Directory);
+	}
+
+	bool Arm()
+	{
+		m_Overlapped = {};
+		return ::ReadDirectoryChangesW(
+		    m_Directory, m_Buffer, sizeof(m_Buffer), FALSE, c_AllChanges, nullptr, &m_Overlapped, nullptr);
+	}
+
+	boost::filesystem::path m_Path;
+	HANDLE m_Directory = INVALID_HANDLE_VALUE;
+	OVERLAPPED m_Overlapped = {};
+	alignas(DWORD) char m_Buffer[1024];
+	bool m_bRemoved = false;
+};
+
+class VCompletionPortMonitor final : public IDirectoryMonitor
+{
+public:
+	VCompletionPortMonitor() : m_Port(::CreateIoCompletionPort(INVALID_HANDLE_VALUE, nullptr, c_StopKey, 1))
+	{
+		if (!m_Port)
+			Throw();
+	}
+
+	~VCompletionPortMonitor() override
+	{
+		// A buffer must stay until the system has let go of it: closing the directory completes its read.
+		std::size_t open = 0;
+		for (auto& [watch, rpRead] : m_Reads)
+		{
+			::CancelIoEx(rpRead->m_Directory, &rpRead->m_Overlapped);
+			++open;
+		}
+		while (open > 0)
+		{
+			DWORD bytes = 0;
+			ULONG_PTR key = c_StopKey;
+			OVERLAPPED* pOverlapped = nullptr;
+			::GetQueuedCompletionStatus(m_Port, &bytes, &key, &pOverlapped, INFINITE);
+			if (pOverlapped)
+				--open;
+		}
+		::CloseHandle(m_Port);
+	}
+
+	int Add(const boost::filesystem::path& i_rDirectory) override
+	{
+		auto pRead = std::make_unique<VRead>();
+		pRead->m_Path = i_rDirectory;
+		pRead->m_Directory = ::CreateFileW(i_rDirectory.c_str(), FILE_LIST_DIRECTORY,
+		    FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE, nullptr, OPEN_EXISTING,
+		    FILE_FLAG_BACKUP_SEMANTICS | FILE_FLAG_OVERLAPPED, nullptr);
+		const std::lock_guard lock(m_Mutex);
+		const int watch = ++m_LastWatch;
+		if (pRead->m_Directory == INVALID_HANDLE_VALUE
+		    || !::CreateIoCompletionPort(pRead->m_Directory, m_Port, ULONG_PTR(watch), 1) || !pRead->Arm())
+			Throw();
+		m_Reads.emplace(watch, std::move(pRead));
+		return watch;
+	}
+
+	void Remove(int i_Watch) override
+	{
+		const std::lock_guard lock(m_Mutex);
+		const auto it = m_Reads.find(i_Watch);
+		if (it == m_Reads.end())
+			return;
+		it->second->m_bRemoved = true;
+		::CancelIoEx(it->second->m_Directory, &it->second->m_Overlapped);
+	}
+
+	bool Wait(std::vector<VSystemEvent>& o_rEvents) override
+	{
+		o_rEvents.clear();
+		while (o_rEvents.empty())
+		{
+			DWORD bytes = 0;
+			ULONG_PTR key = c_StopKey;
+			OVERLAPPED* pOverlapped = nullptr;
+			const BOOL bDone = ::GetQueuedCompletionStatus(m_Port, &bytes, &key, &pOverlapped, INFINITE);
+			const DWORD error = bDone ? ERROR_SUCCESS : ::GetLastError();
+			if (!pOverlapped)
+				return false;
+			Complete(int(key), bytes, error, o_rEvents);
+		}
+		return true;
+	}
+
+	void Stop() override { ::PostQueuedCompletionStatus(m_Port, 0, c_StopKey, nullptr); }
+
+private:
+	void Complete(int i_Watch, DWORD i_Bytes, DWORD i_Error, std::vector<VSystemEvent>& io_rEvents)
+	{
+		const std::lock_guard lock(m_Mutex);
+		const auto it = m_Reads.find(i_Watch);
+		if (it == m_Reads.end())
+			return;
+		VRead& rRead = *it->second;
+		if (rRead.m_bRemoved)
+		{
+			m_Reads.erase(it);
+			return;
+		}
+		if (i_Error == ERROR_SUCCESS && i_Bytes > 0)
+			Translate(i_Watch, rRead, io_rEvents);
+		else if (i_Error == ERROR_SUCCESS || i_Error == ERROR_NOTIFY_ENUM_DIR)
+			io_rEvents.push_back(Failure(i_Watch, "too many changes at once, some are lost", false));
+		else
+		{
+			io_rEvents.push_back(Failure(i_Watch, ErrorText(i_Error), true));
+			m_Reads.erase(it);
+			return;
+		}
+		if (!rRead.Arm())
+		{
+			io_rEvents.push_back(Failure(i_Watch, ErrorText(::GetLastError()), true));
+			m_Reads.erase(it);
+		}
+	}
+
+	static VSystemEvent Failure(int i_Watch, const std::string& i_rText, bool i_bEnded)
+	{
+		VSystemEvent event;
+		event.m_Watch = i_Watch;
+		event.m_Error = i_rText;
+		event.m_bEnded = i_bEnded;
+		return event;
+	}
+
+	/// The system's kinds have our numbers, and it tells a rename as old and new name in a row.
+	static void Translate(int i_Watch, const VRead& i_rRead, std::vector<VSystemEvent>& io_rEvents)
+	{
+		const char* p = i_rRead.m_Buffer;
+		for (;;)
+		{
+			const auto* const pInformation = reinterpret_cast<const FILE_NOTIFY_INFORMATION*>(p);
+			const std::wstring name(pInformation->FileName, pInformation->FileNameLength / sizeof(wchar_t));
+			boost::system::error_code error;
+			VSystemEvent event;
+			event.m_Watch = i_Watch;
+			event.m_Change = EFileChange(pInformation->Action);
+			event.m_Name = ToUtf8(name.data(), int(name.size()));
+			event.m_bDirectory = boost::filesystem::is_directory(i_rRead.m_Path / name, error);
+			io_rEvents.push_back(std::move(event));
+			if (pInformation->NextEntryOffset == 0)
+				return;
+			p += pInformation->NextEntryOffset;
+		}
+	}
+
+	const HANDLE m_Port;
+	std::mutex m_Mutex;
+	int m_LastWatch = 0;
+	std::map<int, std::unique_ptr<VRead>> m_Reads;
+};
+
+} // namespace
+
+std::unique_ptr<IDirectoryMonitor> MakeDirectoryMonitor()
+{
+	return std::make_unique<VCompletionPortMonitor>();
+}
+
+} // namespace FileSystemWatcher
