@@ -29,8 +29,9 @@ public:
 	void Put(const std::string& i_rText)
 	{
 		const std::lock_guard lock(m_Mutex);
-		if (m_Texts.empty() || m_Texts.back() != i_rText)
+		if (i_rText != m_Last || i_rText.find("modified") == std::string::npos)
 			m_Texts.push_back(i_rText);
+		m_Last = i_rText;
 		m_Changed.notify_all();
 	}
 
@@ -63,6 +64,7 @@ private:
 	std::mutex m_Mutex;
 	std::condition_variable m_Changed;
 	std::deque<std::string> m_Texts;
+	std::string m_Last;
 };
 
 TEST(FileSystemWatcher, TellsOfFilesAndDirectories)
