@@ -158,7 +158,9 @@ bool VComputeSubjectFK::IsValid() const
 void VComputeSubjectFK::Update(const double* i_pState)
 {
 	for (const auto& rpSegment : m_SegmentTree)
-		rpSegment->Update(i_pState);
+		rpSegment->Move(i_pState);
+	for (const auto& rpSegment : m_SegmentTree)
+		rpSegment->Place();
 	for (const auto& rTgt : m_Targets)
 		if (rTgt)
 			rTgt->ComputeTargetFK()->Update();

@@ -19,12 +19,10 @@ public:
 	const IComputeJointFK& ComputeJointFK() const override { return m_ComputeJointFK; }
 	const IComputeJointConstraints& ComputeJointConstraints() const override { return m_ComputeJointConstraints; }
 
-	void Move(const double*& io_rpState, const Rotation::VPose<double>& i_rBase, Rotation::VPose<double>& o_rJoint,
-	    Rotation::VPose<double>& o_rLocal) override
+	void Move(const double*& io_rpState, Rotation::VPose<double>& o_rPose) override
 	{
 		m_Joint.SetState(io_rpState);
-		m_Joint.GetPose(o_rJoint);
-		o_rLocal = Rotation::Compose(i_rBase, o_rJoint);
+		m_Joint.GetPose(o_rPose);
 	}
 
 	std::shared_ptr<IJointFK> Clone() const override { return std::make_shared<VJointFK>(m_Joint); }

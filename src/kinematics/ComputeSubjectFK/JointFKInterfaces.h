@@ -46,10 +46,8 @@ public:
 	virtual const IComputeJointFK& ComputeJointFK() const = 0;
 	virtual const IComputeJointConstraints& ComputeJointConstraints() const = 0;
 
-	/// One step of a frame in one call: sets the state, writes the joint's motion to o_rJoint and
-	/// i_rBase composed with it to o_rLocal.
-	virtual void Move(const double*& io_rpState, const Rotation::VPose<double>& i_rBase,
-	    Rotation::VPose<double>& o_rJoint, Rotation::VPose<double>& o_rLocal) = 0;
+	/// SetState and GetPose in one call.
+	virtual void Move(const double*& io_rpState, Rotation::VPose<double>& o_rPose) = 0;
 
 	/// Shares nothing with this one.
 	virtual std::shared_ptr<IJointFK> Clone() const = 0;

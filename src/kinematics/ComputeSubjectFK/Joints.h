@@ -103,4 +103,45 @@ public:
 	void NormaliseState(double*& io_rpState) const override;
 };
 
+inline void VJointFKFree::GetPose(Rotation::VPose<double>& o_rPose) const
+{
+	o_rPose.R = Rotation::RotationMatrixFromAngleAxis({m_State[0], m_State[1], m_State[2]});
+	o_rPose.t = {m_State[3], m_State[4], m_State[5]};
+}
+
+inline void VJointFKBall::GetPose(Rotation::VPose<double>& o_rPose) const
+{
+	o_rPose.R = Rotation::RotationMatrixFromAngleAxis(m_State);
+	o_rPose.t = {};
+}
+
+inline void VJointFKHardySpicer::GetPose(Rotation::VPose<double>& o_rPose) const
+{
+	const double ca = std::cos(m_State[0]);
+	const double sa = std::sin(m_State[0]);
+	const double cb = std::cos(m_State[1]);
+	const double sb = std::sin(m_State[1]);
+	o_rPose.R = {cb * ca, -sa, sb * ca, cb * sa, ca, sb * sa, -sb, 0.0, cb};
+	o_rPose.t = {};
+}
+
+inline void VJointFKHinge::GetPose(Rotation::VPose<double>& o_rPose) const
+{
+	const double c = std::cos(m_State[0]);
+	const double s = std::sin(m_State[0]);
+	o_rPose.R = {c, -s, 0.0, s, c, 0.0, 0.0, 0.0, 1.0};
+	o_rPose.t = {};
+}
+
+inline void VJointFKSlider::GetPose(Rotation::VPose<double>& o_rPose) const
+{
+	o_rPose.R = Rotation::c_Identity3;
+	o_rPose.t = {0.0, 0.0, m_State[0]};
+}
+
+inline void VJointFKDummy::GetPose(Rotation::VPose<double>& o_rPose) const
+{
+	o_rPose = {};
+}
+
 } // namespace ComputeSubject

@@ -1,32 +1,18 @@
 #include "numerics/Rotation.h"
 
+#include "numerics/PoseRows.h"
+
+#include <algorithm>
 #include <cmath>
 #include <numbers>
 
 namespace Rotation
 {
 
-VMatrix3 Product(const VMatrix3& i_rA, const VMatrix3& i_rB)
-{
-	VMatrix3 result;
-	for (int row = 0; row < 3; ++row)
-		for (int column = 0; column < 3; ++column)
-			result[3 * row + column] = i_rA[3 * row] * i_rB[column] + i_rA[3 * row + 1] * i_rB[3 + column]
-			    + i_rA[3 * row + 2] * i_rB[6 + column];
-	return result;
-}
-
 VMatrix3 Transposed(const VMatrix3& i_rMatrix)
 {
 	const VMatrix3& m = i_rMatrix;
 	return {m[0], m[3], m[6], m[1], m[4], m[7], m[2], m[5], m[8]};
-}
-
-VVector3 Product(const VMatrix3& i_rA, const VVector3& i_rVector)
-{
-	const auto& [x, y, z] = i_rVector;
-	return {i_rA[0] * x + i_rA[1] * y + i_rA[2] * z, i_rA[3] * x + i_rA[4] * y + i_rA[5] * z,
-	    i_rA[6] * x + i_rA[7] * y + i_rA[8] * z};
 }
 
 double Determinant(const VMatrix3& i_rMatrix)
@@ -35,17 +21,11 @@ double Determinant(const VMatrix3& i_rMatrix)
 	return m[0] * (m[4] * m[8] - m[5] * m[7]) - m[1] * (m[3] * m[8] - m[5] * m[6]) + m[2] * (m[3] * m[7] - m[4] * m[6]);
 }
 
-VVector3 Apply(const VPose<double>& i_rPose, const VVector3& i_rPoint)
-{
-	VVector3 point = Product(i_rPose.R, i_rPoint);
-	for (int i = 0; i < 3; ++i)
-		point[i] += i_rPose.t[i];
-	return point;
-}
-
 VPose<double> Compose(const VPose<double>& i_rA, const VPose<double>& i_rB)
 {
-	return {Product(i_rA.R, i_rB.R), Apply(i_rA, i_rB.t)};
+	VPose<double> pose;
+	VPoseRows(i_rA, VPoseRows(i_rB)).Store(pose);
+	return pose;
 }
 
 VPose<double> Inverse(const VPose<double>& i_rPose)
@@ -65,21 +45,6 @@ VPose<double> Relative(const VPose<double>& i_rA, const VPose<double>& i_rB)
 VPose<double> PoseFromAngleAxis(const VVector3& i_rRotation, const VVector3& i_rTranslation)
 {
 	return {RotationMatrixFromAngleAxis(i_rRotation), i_rTranslation};
-}
-
-VMatrix3 RotationMatrixFromAngleAxis(const VVector3& i_rAngleAxis)
-{
-	const double angle = std::hypot(i_rAngleAxis[0], i_rAngleAxis[1], i_rAngleAxis[2]);
-	if (angle < c_SmallestAngle)
-		return c_Identity3;
-	const double x = i_rAngleAxis[0] / angle;
-	const double y = i_rAngleAxis[1] / angle;
-	const double z = i_rAngleAxis[2] / angle;
-	const double c = std::cos(angle);
-	const double s = std::sin(angle);
-	const double C = 1.0 - c;
-	return {C * x * x + c, C * x * y - s * z, C * x * z + s * y, C * y * x + s * z, C * y * y + c, C * y * z - s * x,
-	    C * z * x - s * y, C * z * y + s * x, C * z * z + c};
 }
 
 VVector3 AngleAxisFromRotationMatrix(const VMatrix3& i_rRotation)
@@ -122,6 +87,65 @@ VVector3 AngleAxisFromRotationMatrix(const VMatrix3& i_rRotation)
 		return {x, y, z};
 	const double scale = 2.0 * std::atan2(s, w) / s;
 	return {x * scale, y * scale, z * scale};
+}
+
+bool IsRotationMatrix(const VMatrix3& i_rMatrix, double i_Tolerance)
+{
+	const VMatrix3 product = Product(Transposed(i_rMatrix), i_rMatrix);
+	bool bWithin = std::abs(Determinant(i_rMatrix) - 1.0) <= i_Tolerance;
+	for (int i = 0; i < 9; ++i)
+		bWithin = bWithin && std::abs(product[i] - c_Identity3[i]) <= i_Tolerance;
+	return bWithin;
+}
+
+namespace
+{
+
+/// The three axes of an order, and the sign of their permutation.
+struct VEulerAxes
+{
+	explicit VEulerAxes(EEulerOrder i_Order)
+	    : m_First(i_Order >> 4), m_Second(i_Order >> 2 & 3), m_Third(i_Order & 3),
+	      m_Sign((m_First + 1) % 3 == m_Second ? 1.0 : -1.0)
+	{
+	}
+	int m_First;
+	int m_Second;
+	int m_Third;
+	double m_Sign;
+};
+
+} // namespace
+
+void EulerFromRotationMatrix(const VMatrix3& i_rRotation, EEulerOrder i_Order, VVector3& o_rAngles)
+{
+	const auto [first, second, third, sign] = VEulerAxes(i_Order);
+	const auto entry = [&](int i_Row, int i_Column) { return i_rRotation[3 * i_Row + i_Column]; };
+	const double sine = std::clamp(sign * entry(first, third), -1.0, 1.0);
+	// The cosine is taken from the matrix too: the arcsine of a sine near 1 has lost half of its digits.
+	if (std::hypot(entry(first, first), entry(first, second)) > c_SmallestAngle)
+		o_rAngles = {std::atan2(-sign * entry(second, third), entry(third, third)), std::asin(sine), 0.0};
+	else
+		o_rAngles = {0.0, std::copysign(std::numbers::pi / 2.0, sine), 0.0};
+	// With the first turn undone the third stands alone in the row of the second axis. Beside a lock this keeps the
+	// product right, where the first angle follows from rounding errors.
+	const double c = std::cos(o_rAngles[0]);
+	const double s = sign * std::sin(o_rAngles[0]);
+	const auto undone = [&](int i_Column) { return c * entry(second, i_Column) + s * entry(third, i_Column); };
+	o_rAngles[2] = std::atan2(sign * undone(first), undone(second));
+}
+
+VMatrix3 RotationMatrixFromEuler(const VVector3& i_rAngles, EEulerOrder i_Order)
+{
+	const VEulerAxes axes(i_Order);
+	const auto about = [](int i_Axis, double i_Angle)
+	{
+		VVector3 angleAxis{};
+		angleAxis[i_Axis] = i_Angle;
+		return RotationMatrixFromAngleAxis(angleAxis);
+	};
+	return Product(about(axes.m_First, i_rAngles[0]),
+	    Product(about(axes.m_Second, i_rAngles[1]), about(axes.m_Third, i_rAngles[2])));
 }
 
 VVector3 CanonicalAngleAxis(const VVector3& i_rAngleAxis)
