@@ -131,8 +131,8 @@ void EulerFromRotationMatrix(const VMatrix3& i_rRotation, EEulerOrder i_Order, V
 	// product right, where the first angle follows from rounding errors.
 	const double c = std::cos(o_rAngles[0]);
 	const double s = sign * std::sin(o_rAngles[0]);
-	const auto undone = [&](int i_Column) { return c * entry(second, i_Column) + s * entry(third, i_Column); };
-	o_rAngles[2] = std::atan2(sign * undone(first), undone(second));
+	o_rAngles[2] = std::atan2(sign * (c * entry(second, first) + s * entry(third, first)),
+	    c * entry(second, second) + s * entry(third, second));
 }
 
 VMatrix3 RotationMatrixFromEuler(const VVector3& i_rAngles, EEulerOrder i_Order)
