@@ -71,7 +71,11 @@ private:
 			return false;
 		m_p = Text::SkipSpace(m_p, m_pEnd);
 		if (!Is('{'))
+		{
+			if (m_p == m_pEnd && element.m_ValueCount == 0)
+				Error("it ends inside a record");
 			return true;
+		}
 		++m_p;
 		return m_rBuilder.Open(m_pEnd - m_pBegin);
 	}
