@@ -10,7 +10,7 @@
 namespace
 {
 
-thread_local std::size_t g_Allocations = 0;
+std::size_t g_Allocations = 0;
 
 void* Allocate(std::size_t i_Size)
 {

@@ -4,7 +4,6 @@
 
 #include <fstream>
 #include <iterator>
-#include <sstream>
 #include <string>
 
 /// A folder of its own for one test, removed with all that is in it.
@@ -40,7 +39,6 @@ inline void Put(const boost::filesystem::path& i_rPath, const std::string& i_rBy
 
 inline std::string Get(const boost::filesystem::path& i_rPath)
 {
-	std::ostringstream bytes;
-	bytes << std::ifstream(i_rPath.c_str(), std::ios::binary).rdbuf();
-	return bytes.str();
+	std::ifstream file(i_rPath.c_str(), std::ios::binary);
+	return {std::istreambuf_iterator<char>(file), {}};
 }

@@ -1,0 +1,21 @@
+#pragma once
+
+#include "retarget/Program.h"
+
+/// Each adds its options to the program; one source file for each.
+namespace CommandLine
+{
+
+VCommand AddEvalCommand(CLI::App& io_rProgram);
+VCommand AddSchemaCommand(CLI::App& io_rProgram);
+VCommand AddFbxCommand(CLI::App& io_rProgram);
+VCommand AddDumpCommand(CLI::App& io_rProgram);
+VCommand AddConvertCommand(CLI::App& io_rProgram);
+VCommand AddFkCommand(CLI::App& io_rProgram);
+VCommand AddTargetsCommand(CLI::App& io_rProgram);
+VCommand AddCreateCommand(CLI::App& io_rProgram);
+VCommand AddEditCommand(CLI::App& io_rProgram);
+/// Hidden: prints the manual page or the shell completion of the option table.
+VCommand AddDocumentationCommand(CLI::App& io_rProgram);
+
+} // namespace CommandLine

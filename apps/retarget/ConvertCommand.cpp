@@ -1,0 +1,63 @@
+#include "retarget/Commands.h"
+#include "retarget/SubjectFile.h"
+
+#include "CoreOrlexQRTIO/FormatVersions.h"
+#include "CoreOrlexQRTIO/VersionLoss.h"
+#include "CoreOrlexQRTIO/Writer.h"
+#include "DebugServices/GlobalLog.h"
+
+namespace CommandLine
+{
+namespace
+{
+
+struct VConvertSettings
+{
+	std::string m_In;
+	std::string m_Out;
+	std::uint32_t m_Version = CoreOrlexQRTIO::c_AutomaticVersion;
+};
+
+EExitStatus Convert(const VConvertSettings& i_rSettings)
+{
+	const VSubjectFile file = ReadSubjectFile(i_rSettings.m_In);
+	const CoreOrlexTypes::VSubjectRecord& rRecord = file.m_Record;
+	const auto losses = CoreOrlexQRTIO::ListVersionLosses(
+	    rRecord.m_SubjectParametrised, rRecord.m_SubjectApplicationData, file.m_Extras, i_rSettings.m_Version);
+	for (const std::string& rLoss : losses)
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "This version of the format cannot hold: %1%", rLoss);
+	WriteSubjectFile(i_rSettings.m_Out, rRecord.m_SubjectParametrised, rRecord.m_SubjectApplicationData, file.m_Extras,
+	    i_rSettings.m_Version);
+	return EFine;
+}
+
+} // namespace
+
+VCommand AddConvertCommand(CLI::App& io_rProgram)
+{
+	CLI::App* const pApp = AddCommand(io_rProgram, "convert",
+	    "Read a skeleton or retarget file of any version and write it again. An older version cannot hold everything: "
+	    "what it loses is told",
+	    {"convert legacy.qrx hero.qrr", "convert performer.qrs old.qrs --format-version 2.6"});
+	const auto pSettings = std::make_shared<VConvertSettings>();
+	pApp->add_option("IN", pSettings->m_In, "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)")->required();
+	pApp->add_option(
+	        "OUT", pSettings->m_Out, "Where the skeleton file is written; may be IN itself, - is standard output")
+	    ->required();
+	pApp->add_option_function<std::string>(
+	        "--format-version",
+	        [pSettings](const std::string& i_rText)
+	        {
+		        const auto version = CoreOrlexQRTIO::VersionValueFromText(i_rText);
+		        if (!version)
+			        throw CLI::ValidationError("--format-version",
+			            "the format has no version \"" + i_rText + "\", only " + CoreOrlexQRTIO::AllVersionTexts());
+		        pSettings->m_Version = *version;
+	        },
+	        "Version of the format: " + CoreOrlexQRTIO::AllVersionTexts()
+	            + " (default: the lowest from 3.2 on that holds everything)")
+	    ->option_text("X.Y");
+	return {pApp, [pSettings] { return Convert(*pSettings); }};
+}
+
+} // namespace CommandLine

@@ -1,0 +1,41 @@
+#pragma once
+
+#include "retarget/Session.h"
+
+#include <CLI/CLI.hpp>
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace CommandLine
+{
+
+/// One kind of edit: its option, and what it does to a session. Throws VCommandError to fail.
+struct VEditKind
+{
+	const char* m_pName;
+	/// What its value is called in the help, null for an edit without one.
+	const char* m_pValue;
+	const char* m_pHelp;
+	void (*m_pApply)(VSession& io_rSession, const std::string& i_rValue);
+	/// Needs the FBX file beside the subject.
+	bool m_bOfCreate = false;
+};
+
+struct VEdit
+{
+	const VEditKind* m_pKind;
+	std::string m_Value;
+};
+
+/// Edits in the order in which they stand on the line.
+using VEdits = std::vector<VEdit>;
+
+/// Adds the options of all edits to a command; parsing appends to the list.
+void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits, bool i_bOfCreate);
+
+/// Runs them in order, with the document's callbacks after each.
+void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits);
+
+} // namespace CommandLine

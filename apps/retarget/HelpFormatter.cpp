@@ -1,0 +1,104 @@
+#include "retarget/HelpFormatter.h"
+
+namespace CommandLine
+{
+namespace
+{
+
+constexpr std::size_t c_Width = 100;
+constexpr std::size_t c_Column = 32;
+
+std::string Entry(const std::string& i_rName, const std::string& i_rText)
+{
+	std::string line = "  " + i_rName;
+	line += line.size() < c_Column ? std::string(c_Column - line.size(), ' ') : "\n" + std::string(c_Column, ' ');
+	return line + Wrap(i_rText, c_Width - c_Column, c_Column) + "\n";
+}
+
+} // namespace
+
+std::string Wrap(const std::string& i_rText, std::size_t i_Width, std::size_t i_Indent)
+{
+	std::string wrapped;
+	std::size_t column = 0;
+	for (std::size_t begin = 0; begin < i_rText.size();)
+	{
+		const std::size_t end = std::min(i_rText.find_first_of(" \n", begin), i_rText.size());
+		if (column > 0 && column + 1 + (end - begin) > i_Width)
+		{
+			wrapped += "\n" + std::string(i_Indent, ' ');
+			column = 0;
+		}
+		if (column > 0)
+		{
+			wrapped += ' ';
+			++column;
+		}
+		wrapped.append(i_rText, begin, end - begin);
+		column += end - begin;
+		if (end < i_rText.size() && i_rText[end] == '\n')
+		{
+			wrapped += "\n" + std::string(i_Indent, ' ');
+			column = 0;
+		}
+		begin = end + 1;
+	}
+	return wrapped;
+}
+
+VHelpFormatter::VHelpFormatter()
+{
+	label("Positionals", "Arguments");
+}
+
+std::string VHelpFormatter::make_help(const CLI::App* i_pApp, std::string i_Name, CLI::AppFormatMode i_Mode) const
+{
+	std::string help = make_description(i_pApp) + make_usage(i_pApp, i_Name);
+	help += make_subcommands(i_pApp, i_Mode) + make_positionals(i_pApp) + make_groups(i_pApp, i_Mode);
+	// The library puts blank lines of its own between groups.
+	for (std::size_t at = help.find("\n\n\n"); at != std::string::npos; at = help.find("\n\n\n", at))
+		help.erase(at, 1);
+	return help + "\n" + make_footer(i_pApp);
+}
+
+std::string VHelpFormatter::make_group(
+    std::string i_Group, bool i_bPositional, std::vector<const CLI::Option*> i_Options) const
+{
+	std::string group = "\n" + i_Group + ":\n";
+	for (const CLI::Option* pOption : i_Options)
+		group += make_option(pOption, i_bPositional);
+	return group;
+}
+
+std::string VHelpFormatter::make_usage(const CLI::App* i_pApp, std::string i_Name) const
+{
+	// CLI11 hands the chain of names for a command's help.
+	std::string usage = "\nUsage: " + (i_Name.empty() ? std::string("retarget") : i_Name);
+	for (const CLI::Option* pOption : i_pApp->get_options())
+		if (pOption->get_positional())
+			usage += " " + make_option_usage(pOption);
+	for (const CLI::Option* pOption : i_pApp->get_options())
+		if (pOption->nonpositional() && pOption->get_required())
+			usage += " " + pOption->get_name() + " " + pOption->get_option_text();
+	usage += i_pApp->get_parent() ? " [OPTIONS]\n" : " COMMAND [OPTIONS]\n";
+	return usage;
+}
+
+std::string VHelpFormatter::make_description(const CLI::App* i_pApp) const
+{
+	return Wrap(i_pApp->get_description(), c_Width, 0) + "\n";
+}
+
+std::string VHelpFormatter::make_option(const CLI::Option* i_pOption, bool i_bPositional) const
+{
+	const std::string text = i_pOption->get_option_text();
+	return Entry(make_option_name(i_pOption, i_bPositional) + (i_bPositional || text.empty() ? "" : " " + text),
+	    make_option_desc(i_pOption));
+}
+
+std::string VHelpFormatter::make_subcommand(const CLI::App* i_pApp) const
+{
+	return Entry(i_pApp->get_name(), i_pApp->get_description());
+}
+
+} // namespace CommandLine

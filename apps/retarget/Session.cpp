@@ -1,0 +1,140 @@
+#include "retarget/Session.h"
+
+#include "retarget/ExitStatus.h"
+#include "retarget/Messages.h"
+#include "retarget/SubjectFile.h"
+
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "CoreOrlexQRTIO/Writer.h"
+#include "DebugServices/GlobalLog.h"
+#include "FBXIO/FBXReader.h"
+#include "InMemoryHost/Flow.h"
+#include "NVX/Status.h"
+#include "RetargetSetupDocument/BindPose.h"
+#include "RetargetSetupDocument/FilePose.h"
+#include "RetargetSetupDocument/TargetConstruction.h"
+
+#include <algorithm>
+#include <numbers>
+
+namespace CommandLine
+{
+namespace
+{
+
+std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_rSkeleton)
+{
+	VElements bones{"bone", {}};
+	for (const FBXIO::VSkinBone& rBone : i_rSkeleton)
+		bones.m_Names.push_back(rBone.m_Name);
+	// The name comes first: a bone may be called by a number.
+	if (std::find(bones.m_Names.begin(), bones.m_Names.end(), i_rWord) != bones.m_Names.end() || i_rWord[0] == '#')
+		return FindElement(i_rWord, bones);
+	if (i_rWord.find_first_not_of("0123456789") == std::string::npos)
+		return FindElement("#" + i_rWord, bones);
+	// Or as the segment will be called, without the namespace.
+	for (std::string& rName : bones.m_Names)
+		rName = RetargetSetup::StripNamespace(rName);
+	return FindElement(i_rWord, bones);
+}
+
+} // namespace
+
+VSession::VSession()
+    : m_pDispatcher(std::make_shared<InMemoryHost::VDispatcher>()),
+      m_pDocument(std::make_unique<VRetargetSetup>(m_pDispatcher,
+          NVX::CountedPointer<TesselPluginInterface::IFrameFactory>(new InMemoryHost::VFrameFactory),
+          NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)))
+{
+}
+
+void VSession::LoadSource(const std::string& i_rPath)
+{
+	if (!m_pDocument->LoadSourceSubject(i_rPath, ""))
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a source skeleton");
+	Settle();
+}
+
+void VSession::LoadTarget(const std::string& i_rPath)
+{
+	const std::uint32_t status = m_pDocument->LoadTargetSubject(i_rPath);
+	if (status == NVX::Status::c_NewerFileVersion)
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" is of a later version than this program reads");
+	if (status == NVX::Status::c_FileNotOpened)
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be opened");
+	if (status != NVX::Status::c_Success)
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a retarget subject");
+	Settle();
+}
+
+void VSession::CreateTarget(const std::string& i_rPath, const std::string& i_rRoot)
+{
+	if (!m_pDocument->LoadTargetFBX(i_rPath))
+		throw VCommandError(EBadInput,
+		    m_pDocument->IsTargetFBXComplete() ? "\"" + i_rPath + "\" could not be read as FBX, or holds no skeleton"
+		                                       : "\"" + i_rPath + "\" could be read only in part");
+	const auto pSkeleton = m_pDocument->GetFBXSkeleton();
+	if (!m_pDocument->IsTargetFBXComplete())
+		throw VCommandError(EBadInput,
+		    "\"" + i_rPath + "\" could be read only in part: " + std::to_string(pSkeleton->size())
+		        + " bones up to where it broke off");
+	std::size_t root = 0;
+	if (!i_rRoot.empty())
+	{
+		root = FindRoot(i_rRoot, *pSkeleton);
+		m_pDocument->SetTargetRootIndex(std::uint32_t(root));
+	}
+	m_pDocument->CreateTargetSubject();
+	Settle();
+	m_File = {RetargetSetup::ExtractSubtree(*pSkeleton, root), m_pDocument->GetTargetAxisMatrix()};
+}
+
+void VSession::Save(const std::string& i_rPath)
+{
+	if (i_rPath == "-")
+	{
+		const auto values = m_pDocument->TargetValues();
+		WriteSubjectFile(i_rPath, *values.m_pParametrised, *values.m_pApplicationData, m_pDocument->GetTargetExtras(),
+		    CoreOrlexQRTIO::c_AutomaticVersion);
+		return;
+	}
+	if (m_pDocument->SaveTargetSubject(i_rPath) != NVX::Status::c_Success)
+		throw VCommandError(EBadOutput, "\"" + i_rPath + "\" could not be written");
+}
+
+const CoreOrlexTypes::VSubjectParametrised& VSession::Source(const std::string& i_rWhatFor) const
+{
+	const auto pSource = m_pDocument->SourceValues().m_pParametrised;
+	if (!pSource)
+		throw VCommandError(
+		    EWrongUsage, i_rWhatFor + " needs the performer's skeleton: give it with --source FILE.qrs");
+	return *pSource;
+}
+
+const CoreOrlexTypes::VSubjectParametrised& VSession::Target() const
+{
+	return *m_pDocument->TargetValues().m_pParametrised;
+}
+
+std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectValues& i_rValues, const char* i_pWhich)
+{
+	const auto pFK = RetargetSetup::KinematicsInBindPose(*i_rValues.m_pParametrised, *i_rValues.m_pSubject, i_pWhich);
+	return pFK ? RetargetSetup::SegmentPoses(*pFK) : std::vector<Rotation::VPose<double>>();
+}
+
+void TellDifferenceFromFile(VSession& io_rSession, int i_Level, const char* i_pWhat, const char* i_pHint)
+{
+	const auto values = io_rSession.Document().TargetValues();
+	const VCharacterFile& rFile = *io_rSession.File();
+	const auto worst = RetargetSetup::WorstPoseDifference(
+	    RetargetSetup::PosesInFile(rFile.m_Bones, rFile.m_Axis, io_rSession.Document().GetTargetScale()),
+	    BindPosesOf(values, "target"));
+	if (!worst)
+		return;
+	const std::string& rName = values.m_pParametrised->m_Segments[worst->m_SegmentIndex].m_Name;
+	NVX_LOG(c_pCategory, i_Level,
+	    "%1% differs from the pose in the file, at worst \"%2%\" by %3$.1f mm and %4$.1f degrees%5%", i_pWhat, rName,
+	    worst->m_Distance, worst->m_Angle * 180.0 / std::numbers::pi, i_pHint);
+}
+
+} // namespace CommandLine

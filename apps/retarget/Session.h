@@ -1,0 +1,76 @@
+#pragma once
+
+#include "retarget/Elements.h"
+
+#include "FBXIO/SkinSkeleton.h"
+#include "InMemoryHost/Dispatcher.h"
+#include "RetargetSetupDocument/RetargetSetup.h"
+#include "numerics/Rotation.h"
+
+#include <QMatrix4x4>
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace CommandLine
+{
+
+/// The FBX file that a target subject was made of.
+struct VCharacterFile
+{
+	/// The chosen root and all below it, in the order of the segments.
+	FBXIO::VSkinSkeleton m_Bones;
+	/// Turns the file's space into the system's Z-up space.
+	QMatrix4x4 m_Axis;
+};
+
+/// The document with host services in memory. Operations throw VCommandError to fail.
+class VSession
+{
+public:
+	VSession();
+
+	/// EBadInput if the file cannot be read.
+	void LoadSource(const std::string& i_rPath);
+	void LoadTarget(const std::string& i_rPath);
+
+	/// Reads the FBX file and makes the target subject of it, from the root bone of this name or index on; an empty
+	/// text leaves the choice to the document. EWrongUsage for a root that the file does not have.
+	void CreateTarget(const std::string& i_rPath, const std::string& i_rRoot);
+
+	/// EBadOutput if the file could not be written; the one that stood there then stays. "-" is standard output.
+	void Save(const std::string& i_rPath);
+
+	VRetargetSetup& Document() { return *m_pDocument; }
+
+	/// Runs what the document has posted.
+	void Settle() { m_pDispatcher->RunPending(); }
+
+	/// EWrongUsage, with what the source is needed for, if there is none.
+	const CoreOrlexTypes::VSubjectParametrised& Source(const std::string& i_rWhatFor) const;
+	const CoreOrlexTypes::VSubjectParametrised& Target() const;
+
+	/// Where the target subject was made here.
+	const std::optional<VCharacterFile>& File() const { return m_File; }
+
+	/// Whether targets that are added get a mirrored partner; off at first, as in the panel.
+	bool m_bSymmetry = false;
+	/// The bind poses have been taken from the file.
+	bool m_bMatched = false;
+
+private:
+	std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher;
+	std::unique_ptr<VRetargetSetup> m_pDocument;
+	std::optional<VCharacterFile> m_File;
+};
+
+/// World poses of all segments of a subject in its bind pose, in mm; empty, which is told, if it has no
+/// kinematics.
+std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectValues& i_rValues, const char* i_pWhich);
+
+/// Tells if the segments stand elsewhere than the bones of the file, with the worst bone in mm and degrees.
+/// @param i_pWhat begins the message, i_pHint ends it.
+void TellDifferenceFromFile(VSession& io_rSession, int i_Level, const char* i_pWhat, const char* i_pHint);
+
+} // namespace CommandLine

@@ -1,0 +1,62 @@
+#include "retarget/SubjectFile.h"
+
+#include "retarget/ExitStatus.h"
+#include "retarget/Messages.h"
+#include "retarget/Output.h"
+#include "retarget/Session.h"
+
+#include "CoreOrlexQRTIO/Reader.h"
+#include "CoreOrlexQRTIO/Writer.h"
+#include "DebugServices/GlobalLog.h"
+#include "NVX/Status.h"
+#include "RetargetSetupDocument/FilePath.h"
+#include "RetargetSetupDocument/Identity.h"
+
+namespace CommandLine
+{
+
+VSubjectFile ReadSubjectFile(const std::string& i_rPath)
+{
+	VSubjectFile file;
+	if (RetargetSetup::FileExtension(i_rPath) == ".qrx")
+	{
+		VSession session;
+		session.LoadTarget(i_rPath);
+		const auto values = session.Document().TargetValues();
+		file.m_Record = {*values.m_pParametrised, *values.m_pApplicationData};
+		file.m_Extras = session.Document().GetTargetExtras();
+		return file;
+	}
+	CoreOrlexQRTIO::VReader reader;
+	if (!reader.Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId,
+	        file.m_Record.m_SubjectParametrised, file.m_Record.m_SubjectApplicationData, file.m_Extras))
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a skeleton file");
+	return file;
+}
+
+void WriteSubjectFile(const std::string& i_rPath, const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
+    const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData,
+    const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras, std::uint32_t i_VersionValue)
+{
+	CoreOrlexQRTIO::VWriter writer;
+	if (i_rPath != "-")
+	{
+		if (writer.Write(i_rPath, i_rSubject, i_rApplicationData, i_rExtras, i_VersionValue) != NVX::Status::c_Success)
+			throw VCommandError(EBadOutput, "\"" + i_rPath + "\" could not be written");
+		return;
+	}
+	std::string text;
+	std::vector<std::string> errors;
+	std::vector<std::string> warnings;
+	const bool bWritten =
+	    writer.WriteText(i_rSubject, i_rApplicationData, i_rExtras, i_VersionValue, text, errors, warnings);
+	for (const std::string& rWarning : warnings)
+		NVX_LOG("QRTIO", NVX::ELogWarning, "%1%", rWarning);
+	for (const std::string& rError : errors)
+		NVX_LOG("QRTIO", NVX::ELogError, "%1%", rError);
+	if (!bWritten)
+		throw VCommandError(EBadOutput, "the subject could not be written");
+	Print(text);
+}
+
+} // namespace CommandLine

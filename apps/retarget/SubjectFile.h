@@ -1,0 +1,28 @@
+#pragma once
+
+#include "CoreOrlexQRTIO/SubjectQRTExtras.h"
+#include "CoreOrlexTypes/SubjectRecord.h"
+
+#include <string>
+
+namespace CommandLine
+{
+
+/// What a file of the skeleton family holds.
+struct VSubjectFile
+{
+	CoreOrlexTypes::VSubjectRecord m_Record;
+	CoreOrlexQRTIO::VSubjectQRTExtras m_Extras;
+};
+
+/// Reads a skeleton file as it stands, or a legacy text file (.qrx) as the document takes it in. Throws VCommandError
+/// with EBadInput if that fails.
+VSubjectFile ReadSubjectFile(const std::string& i_rPath);
+
+/// Writes a skeleton file at a version of the format, to standard output if the path is "-". Throws VCommandError with
+/// EBadOutput if that fails; a file that stood there then stays.
+void WriteSubjectFile(const std::string& i_rPath, const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
+    const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData,
+    const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras, std::uint32_t i_VersionValue);
+
+} // namespace CommandLine

@@ -1,0 +1,162 @@
+#include "retarget/Commands.h"
+#include "retarget/Output.h"
+#include "retarget/Residuals.h"
+#include "retarget/Session.h"
+#include "retarget/Table.h"
+
+#include "CoreOrlexTypes/Fields.h"
+#include "RetargetSetupDocument/RetargetTargets.h"
+
+#include <cstdlib>
+#include <numbers>
+#include <unistd.h>
+
+namespace CommandLine
+{
+namespace
+{
+
+struct VTargetsSettings
+{
+	std::string m_File;
+	std::string m_Source;
+	bool m_bJson = false;
+};
+
+/// What is shown of one target; empty texts for what it does not have.
+struct VTargetLine
+{
+	std::string m_Name;
+	std::string m_Type;
+	std::string m_Source;
+	std::string m_Target;
+	double m_Weight = 0.0;
+	std::vector<std::string> m_State;
+	VResidual m_Residual;
+};
+
+std::vector<VTargetLine> Lines(VSession& io_rSession, bool i_bResiduals)
+{
+	const VRetargetSetup::VSubjectValues target = io_rSession.Document().TargetValues();
+	const auto& rSubject = *target.m_pParametrised;
+	std::vector<VTargetLine> lines(rSubject.m_Targets.size());
+	std::vector<VResidual> residuals(lines.size());
+	if (i_bResiduals)
+		residuals = Residuals(io_rSession.Document().SourceValues(), target);
+	for (std::size_t i = 0; i < lines.size(); ++i)
+	{
+		const auto& rTarget = rSubject.m_Targets[i];
+		VTargetLine& rLine = lines[i];
+		if (i < target.m_pApplicationData->m_Targets.size())
+			rLine.m_Name = target.m_pApplicationData->m_Targets[i].m_Name;
+		rLine.m_Type = CoreOrlexTypes::EnumeratorName(rTarget.m_Type);
+		if (const std::string* pName = RetargetSetup::SourceName(rSubject, rTarget))
+			rLine.m_Source = *pName;
+		if (const std::string* pName = RetargetSetup::TargetSegmentName(rSubject, rTarget))
+			rLine.m_Target = *pName;
+		rLine.m_Weight = rTarget.m_Weight;
+		rLine.m_State = rTarget.m_StateExpressions;
+		rLine.m_Residual = residuals[i];
+	}
+	return lines;
+}
+
+double Degrees(double i_Radians)
+{
+	return i_Radians * 180.0 / std::numbers::pi;
+}
+
+VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
+{
+	VJson list = VJson::array();
+	for (const VTargetLine& rLine : i_rLines)
+	{
+		VJson item = VJson::object();
+		item["index"] = list.size();
+		item["name"] = rLine.m_Name;
+		item["type"] = rLine.m_Type;
+		item["source"] = rLine.m_Source;
+		item["target"] = rLine.m_Target;
+		item["weight"] = rLine.m_Weight;
+		item["state"] = rLine.m_State;
+		if (i_bResiduals)
+		{
+			item["distance"] = rLine.m_Residual.m_Distance ? VJson(*rLine.m_Residual.m_Distance) : VJson();
+			item["angle"] = rLine.m_Residual.m_Angle ? VJson(Degrees(*rLine.m_Residual.m_Angle)) : VJson();
+		}
+		list.push_back(std::move(item));
+	}
+	return list;
+}
+
+std::string ResidualText(const VResidual& i_rResidual)
+{
+	if (i_rResidual.m_Distance)
+		return Fixed(*i_rResidual.m_Distance, 3) + " mm";
+	if (i_rResidual.m_Angle)
+		return Fixed(Degrees(*i_rResidual.m_Angle), 3) + " deg";
+	return "-";
+}
+
+std::string LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
+{
+	VTable table;
+	table.AddColumn("INDEX", VTable::ERight);
+	table.AddColumn("NAME", VTable::ELeft);
+	table.AddColumn("TYPE", VTable::ELeft);
+	table.AddColumn("SOURCE", VTable::ELeft);
+	table.AddColumn("TARGET", VTable::ELeft);
+	table.AddColumn("WEIGHT", VTable::ERight);
+	if (i_bResiduals)
+		table.AddColumn("RESIDUAL", VTable::ERight);
+	table.AddColumn("STATE", VTable::ELeft);
+	for (std::size_t i = 0; i < i_rLines.size(); ++i)
+	{
+		const VTargetLine& rLine = i_rLines[i];
+		std::vector<std::string> texts{
+		    std::to_string(i), rLine.m_Name, rLine.m_Type, rLine.m_Source, rLine.m_Target, Shortest(rLine.m_Weight)};
+		if (i_bResiduals)
+			texts.push_back(ResidualText(rLine.m_Residual));
+		std::string state;
+		for (const std::string& rExpression : rLine.m_State)
+			state += (state.empty() ? "" : " ") + rExpression;
+		texts.push_back(state);
+		table.AddRow(texts);
+	}
+	const char* pNoColour = std::getenv("NO_COLOR");
+	return table.Text(isatty(STDOUT_FILENO) && !(pNoColour && *pNoColour));
+}
+
+EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)
+{
+	VSession session;
+	session.LoadTarget(i_rSettings.m_File);
+	const bool bResiduals = !i_rSettings.m_Source.empty();
+	if (bResiduals)
+		session.LoadSource(i_rSettings.m_Source);
+	const std::vector<VTargetLine> lines = Lines(session, bResiduals);
+	if (i_rSettings.m_bJson)
+		PrintJson(LinesToJson(lines, bResiduals));
+	else
+		Print(LinesToTable(lines, bResiduals));
+	return EFine;
+}
+
+} // namespace
+
+VCommand AddTargetsCommand(CLI::App& io_rProgram)
+{
+	CLI::App* const pApp = AddCommand(io_rProgram, "targets",
+	    "Show the targets of a retarget subject as a table; with the performer's skeleton also how far each is, in the "
+	    "bind poses, from what it asks for: mm for positions, degrees for rotations",
+	    {"targets hero.qrr", "targets hero.qrr --source performer.qrs",
+	        "targets hero.qrr --source performer.qrs --json | jq '.[] | select(.distance > 1)'"});
+	const auto pSettings = std::make_shared<VTargetsSettings>();
+	pApp->add_option("FILE.qrr", pSettings->m_File, "The retarget subject, or a legacy one (.qrx)")->required();
+	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton, for the residuals")
+	    ->option_text("FILE.qrs");
+	pApp->add_flag("--json", pSettings->m_bJson, "As JSON, distances in mm and angles in degrees");
+	return {pApp, [pSettings] { return ShowTargets(*pSettings); }};
+}
+
+} // namespace CommandLine

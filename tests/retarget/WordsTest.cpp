@@ -1,0 +1,119 @@
+#include "retarget/Elements.h"
+#include "retarget/ExitStatus.h"
+#include "retarget/HelpFormatter.h"
+#include "retarget/Output.h"
+#include "retarget/Suggest.h"
+
+#include <gtest/gtest.h>
+
+#include <limits>
+
+using namespace CommandLine;
+
+namespace
+{
+
+template <typename TCall>
+std::string RefusalOf(TCall&& i_rCall)
+{
+	try
+	{
+		i_rCall();
+	}
+	catch (const VCommandError& rError)
+	{
+		EXPECT_EQ(rError.Status(), EWrongUsage);
+		return rError.what();
+	}
+	return "accepted";
+}
+
+TEST(Suggest, CountsEdits)
+{
+	EXPECT_EQ(EditDistance("kitten", "sitting"), 3u);
+	EXPECT_EQ(EditDistance("LeftArm", "letfarm"), 1u) << "neighbours swapped, case ignored";
+	EXPECT_EQ(EditDistance("", "abc"), 3u);
+	EXPECT_EQ(EditDistance("ca", "abc"), 3u) << "no part is edited twice";
+}
+
+TEST(Suggest, NamesTheClosestFirst)
+{
+	const std::vector<std::string> names{"Hips", "LeftArm", "RightArm", "LeftForeArm", "Head", "LeftArm"};
+	EXPECT_EQ(Closest("LeftAmr", names), (std::vector<std::string>{"LeftArm", "RightArm", "LeftForeArm"}));
+	EXPECT_EQ(Closest("Character1:Hips", names, 1), (std::vector<std::string>{"Hips"}));
+	EXPECT_EQ(DidYouMean("hed", names, 1), "; did you mean \"Head\"?");
+	EXPECT_EQ(DidYouMean("hed", {}), "");
+}
+
+TEST(Elements, FindsByNameAndIndex)
+{
+	const VElements elements{"segment", {"Hips", "Arm", "Spine", "Arm", "a:b", "#x"}};
+	EXPECT_EQ(FindElement("Spine", elements), 2u);
+	EXPECT_EQ(FindElement("#3", elements), 3u);
+	EXPECT_EQ(FindElement("#x", elements), 5u) << "only digits make an index";
+	EXPECT_EQ(RefusalOf([&] { FindElement("Arm", elements); }),
+	    "more than one segment is called \"Arm\": name one by its index (#1, #3)");
+	EXPECT_EQ(RefusalOf([&] { FindElement("#6", elements); }),
+	    "there is no segment #6; they go from #0 to #5, the last is \"#x\"");
+	EXPECT_EQ(RefusalOf([&] { FindElement("#99999999999999999999", elements); }),
+	    "there is no segment #99999999999999999999; they go from #0 to #5, the last is \"#x\"");
+	EXPECT_EQ(RefusalOf([&] { FindElement("Spin", elements); }),
+	    "there is no segment \"Spin\"; did you mean \"Spine\", \"Hips\" or \"Arm\"?");
+	EXPECT_EQ(RefusalOf(
+	              [&] {
+		              FindElement("#0", {"segment", {}});
+	              }),
+	    "there is no segment #0; there is no segment at all");
+}
+
+TEST(Elements, SplitsWhereBothNamesExist)
+{
+	const VElements source{"source segment", {"Hips", "a", "a:b"}};
+	const VElements target{"target segment", {"pelvis", "b:c", "c", "d"}};
+	using VPair = std::pair<std::size_t, std::size_t>;
+	EXPECT_EQ(FindPair("Hips:pelvis", source, target), VPair(0, 0));
+	EXPECT_EQ(FindPair("a:b:d", source, target), VPair(2, 3));
+	EXPECT_EQ(FindPair("#1:b:c", source, target), VPair(1, 1));
+	EXPECT_EQ(FindPair("#2:#3", source, target), VPair(2, 3));
+	EXPECT_EQ(RefusalOf([&] { FindPair("a:b:c", source, target); }),
+	    "\"a:b:c\" can be split in more than one way: name a segment by its index, as #3");
+	EXPECT_EQ(RefusalOf([&] { FindPair("Hips", source, target); }), "\"Hips\" is not SOURCE:TARGET");
+	EXPECT_EQ(RefusalOf([&] { FindPair("Hips:pelvsi", source, target); }),
+	    "there is no target segment \"pelvsi\"; did you mean \"pelvis\", \"b:c\" or \"c\"?");
+	EXPECT_EQ(RefusalOf([&] { FindPair("hops:pelvis", source, target); }),
+	    "there is no source segment \"hops\"; did you mean \"Hips\", \"a\" or \"a:b\"?");
+	EXPECT_EQ(RefusalOf([&] { FindPair("Hips:#4", source, target); }),
+	    "there is no target segment #4; they go from #0 to #3, the last is \"d\"");
+}
+
+TEST(Elements, ReadsNumbersThatAreFiniteOnly)
+{
+	EXPECT_EQ(ParseList("1,-2.5e1, 3", "pose"), (std::vector<double>{1, -25, 3}));
+	for (const char* pWord : {"", "1,", "1,,2", "1;2", "nan", "inf", "1e999", "0,5,x", "1 "})
+		EXPECT_NE(RefusalOf([&] { ParseList(pWord, "pose"); }), "accepted") << pWord;
+	EXPECT_EQ(RefusalOf([] { ParseFinite("1,5", "weight"); }), "weight: \"1,5\" is not a finite number");
+	EXPECT_EQ(SplitAssignment("a=b=1", "N=W"), (std::pair<std::string, std::string>("a=b", "1")));
+	EXPECT_EQ(RefusalOf([] { SplitAssignment("=1", "N=W"); }), "\"=1\" is not N=W");
+	EXPECT_EQ(ParseIndex("#2", "target", 3), 2u);
+	EXPECT_EQ(RefusalOf([] { ParseIndex("3", "target", 3); }), "there is no target #3; they go from #0 to #2");
+	EXPECT_EQ(RefusalOf([] { ParseIndex("-1", "target", 3); }), "\"-1\" is not the index of a target");
+}
+
+TEST(Output, JsonHoldsWhatTextAndNumbersMayBe)
+{
+	VJson json = VJson::object();
+	json["list"] = {1.5, std::numeric_limits<double>::quiet_NaN(), -std::numeric_limits<double>::infinity()};
+	json["text"] = "a\xFF\"b";
+	json["empty"] = VJson::array();
+	EXPECT_EQ(
+	    JsonText(json), "{\n \"list\": [1.5, null, null],\n \"text\": \"a\xEF\xBF\xBD\\\"b\",\n \"empty\": []\n}");
+}
+
+TEST(HelpFormatter, WrapsAtBlanks)
+{
+	EXPECT_EQ(Wrap("one two three", 7, 2), "one two\n  three");
+	EXPECT_EQ(Wrap("unbreakable", 4, 2), "unbreakable");
+	EXPECT_EQ(Wrap("a\nb c", 10, 1), "a\n b c");
+}
+
+} // namespace
