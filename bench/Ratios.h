@@ -23,6 +23,8 @@ struct VRatio
 class VReporter : public benchmark::ConsoleReporter
 {
 public:
+	VReporter() : ConsoleReporter(OO_Tabular) {}
+
 	void ReportRuns(const std::vector<Run>& i_rRuns) override
 	{
 		std::vector<Run> medians;

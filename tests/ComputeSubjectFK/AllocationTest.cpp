@@ -10,7 +10,7 @@
 namespace
 {
 
-std::size_t g_Allocations = 0;
+thread_local std::size_t g_Allocations = 0;
 
 void* Allocate(std::size_t i_Size)
 {

@@ -163,6 +163,33 @@ TEST_F(StaticExpressionParser, TellsTheNamesThatAnExpressionUses)
 	EXPECT_FALSE(m_Parser.EvaluateFull("Arm^", names) && m_Parser.EvaluateFull("Arm^ ", names));
 }
 
+TEST_F(StaticExpressionParser, ContextsDifferInWhatTheyTake)
+{
+	using enum EExpressionContext;
+	ASSERT_TRUE(m_Parser.AddStaticParameter("Arm", 3.0, m_Error));
+	m_Parser.SetVariable("GlobalScale", 2.0);
+	const struct
+	{
+		const char* pExpression;
+		EExpressionContext Context;
+		/// Null if the value is 6.
+		const char* pError;
+	} rows[] = {{"2*Arm", EStatic, nullptr}, {"2*Arm", ELinear, nullptr}, {"2*Arm", EFull, nullptr},
+	    {"GlobalScale*Arm", EStatic, "Parse Error at column 12: ID \"GlobalScale\" was referenced but never declared"},
+	    {"GlobalScale*Arm", ELinear, nullptr}, {"GlobalScale*Arm", EFull, nullptr},
+	    {"Arm^2-Arm*cos(0)", EStatic, nullptr},
+	    {"Arm^2-Arm", ELinear, "Parse Error at column 7: Power operator invalid for arguments"},
+	    {"2*Arm*cos(0)", ELinear, "Parse Error at column 10: Unknown function \"cos\""},
+	    {"Arm^GlobalScale-Arm*cos(0)", EFull, nullptr}};
+	for (const auto& rRow : rows)
+	{
+		double value = 7.0;
+		EXPECT_EQ(m_Parser.Evaluate(rRow.pExpression, value, m_Error, rRow.Context), rRow.pError == nullptr);
+		EXPECT_EQ(value, rRow.pError ? 0.0 : 6.0) << rRow.pExpression;
+		EXPECT_EQ(m_Error, rRow.pError ? rRow.pError : "");
+	}
+}
+
 TEST(SingleElementIVector, TakesOneNumber)
 {
 	static std::string s_Told;

@@ -4,6 +4,7 @@
 
 #include <fstream>
 #include <iterator>
+#include <sstream>
 #include <string>
 
 /// A folder of its own for one test, removed with all that is in it.
@@ -39,6 +40,7 @@ inline void Put(const boost::filesystem::path& i_rPath, const std::string& i_rBy
 
 inline std::string Get(const boost::filesystem::path& i_rPath)
 {
-	std::ifstream file(i_rPath.c_str(), std::ios::binary);
-	return {std::istreambuf_iterator<char>(file), {}};
+	std::ostringstream bytes;
+	bytes << std::ifstream(i_rPath.c_str(), std::ios::binary).rdbuf();
+	return bytes.str();
 }

@@ -198,7 +198,7 @@ TEST(SaveFile, IsWholeAtEveryMoment)
 	char byte = 0;
 	for (int round = 0; round < 4; ++round)
 		ASSERT_EQ(::read(ready[0], &byte, 1), 1);
-	for (int round = 0; round < 300; ++round)
+	for (int round = 0; round < 100; ++round)
 	{
 		const std::string bytes = Get(file);
 		ASSERT_TRUE(bytes == contents[0] || bytes == contents[1]) << bytes.size();

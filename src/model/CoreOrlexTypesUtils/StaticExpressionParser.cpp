@@ -90,7 +90,7 @@ bool VStaticExpressionParser::AddStaticParameter(
     const std::string& i_rName, const std::string& i_rExpression, std::string& o_rError)
 {
 	double value = 0.0;
-	if (!IsNew(i_rName, o_rError) || !EvaluateStatic(i_rName, i_rExpression, value, o_rError))
+	if (!IsNew(i_rName, o_rError) || !Validate(i_rName, i_rExpression, value, o_rError))
 		return false;
 	Add({i_rName, i_rExpression, value, true});
 	return true;
@@ -109,7 +109,7 @@ bool VStaticExpressionParser::SetStaticParameter(
 {
 	VParameter* const pParameter = Find(i_rName, o_rError);
 	double value = 0.0;
-	if (!pParameter || !EvaluateStatic(i_rName, i_rExpression, value, o_rError))
+	if (!pParameter || !Validate(i_rName, i_rExpression, value, o_rError))
 		return false;
 	pParameter->Expression = i_rExpression;
 	pParameter->bHasExpression = true;
@@ -153,7 +153,7 @@ VStaticExpressionParser::VParameter* VStaticExpressionParser::Find(const std::st
 	return nullptr;
 }
 
-bool VStaticExpressionParser::EvaluateStatic(
+bool VStaticExpressionParser::Validate(
     const std::string& i_rName, const std::string& i_rExpression, double& o_rValue, std::string& o_rError) const
 {
 	VValueResult result;
@@ -227,10 +227,13 @@ bool VDynamicExpressionParserBase<TLinearFactory>::Initialise(
 
 template <typename TLinearFactory>
 bool VDynamicExpressionParserBase<TLinearFactory>::Evaluate(
-    std::string_view i_Expression, double& o_rValue, std::string& o_rError) const
+    std::string_view i_Expression, double& o_rValue, std::string& o_rError, EExpressionContext i_Context) const
 {
+	const Math::VMathParser& rParser = i_Context == EExpressionContext::EStatic ? StaticParser()
+	    : i_Context == EExpressionContext::EFull                                ? m_FullParser
+	                                                                            : m_LinearParser;
 	VValueResult result;
-	const bool bGood = Parse(m_LinearParser, i_Expression, result, o_rError);
+	const bool bGood = Parse(rParser, i_Expression, result, o_rError);
 	o_rValue = result.m_Value;
 	return bGood;
 }

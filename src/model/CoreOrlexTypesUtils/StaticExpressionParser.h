@@ -15,6 +15,17 @@
 namespace CoreOrlexTypesUtils
 {
 
+/// What an expression may use. Static parameters are constants in all of them.
+enum class EExpressionContext
+{
+	/// Powers and functions, no dynamic parameters: the default expressions of static parameters.
+	EStatic,
+	/// Dynamic parameters as variables, no powers and no functions: the geometry of segments and targets.
+	ELinear,
+	/// Dynamic parameters, powers and functions.
+	EFull
+};
+
 /// The static parameters of a subject: named numbers, and named expressions over those declared before them, with
 /// powers, sin, cos and tan. Nothing throws; results are a boolean and a text that tells what is wrong. Where a call
 /// fails, nothing has changed. Used by one thread at a time.
@@ -63,6 +74,7 @@ protected:
 	};
 
 	const std::vector<VParameter>& Parameters() const { return m_Parameters; }
+	const Math::VMathParser& StaticParser() const { return m_StaticParser; }
 
 private:
 	virtual void OnStaticParameterAdded(const std::string& i_rName, double i_Value);
@@ -70,7 +82,7 @@ private:
 
 	bool IsNew(const std::string& i_rName, std::string& o_rError) const;
 	VParameter* Find(const std::string& i_rName, std::string& o_rError);
-	bool EvaluateStatic(
+	bool Validate(
 	    const std::string& i_rName, const std::string& i_rExpression, double& o_rValue, std::string& o_rError) const;
 	void Add(VParameter i_Parameter);
 	void Change(VParameter& io_rParameter, double i_Value);
@@ -83,8 +95,7 @@ private:
 	Math::VMathParser m_StaticParser;
 };
 
-/// Adds the dynamic parameters as variables, and two more contexts in which expressions are evaluated: the linear one,
-/// without powers and functions, for the geometry of segments and targets, and the full one.
+/// Adds the dynamic parameters as variables, and with them the linear and the full context.
 template <typename TLinearFactory>
 class VDynamicExpressionParserBase : public VStaticExpressionParser
 {
@@ -115,8 +126,9 @@ public:
 	/// @return true if no parameter failed.
 	bool Initialise(const CoreOrlexTypes::VSubjectParametrised& i_rSubject, std::vector<std::string>& io_rErrors);
 
-	/// In the linear context. An empty expression is 0, and so is the value of one that fails.
-	bool Evaluate(std::string_view i_Expression, double& o_rValue, std::string& o_rError) const;
+	/// An empty expression is 0, and so is the value of one that fails.
+	bool Evaluate(std::string_view i_Expression, double& o_rValue, std::string& o_rError,
+	    EExpressionContext i_Context = EExpressionContext::ELinear) const;
 
 	/// Adds all variables and constants that an expression uses in the linear context.
 	bool EvaluateChecked(std::string_view i_Expression, std::set<std::string>& io_rNames, std::string& o_rError) const;

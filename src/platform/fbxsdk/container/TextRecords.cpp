@@ -55,7 +55,7 @@ private:
 		m_p = Text::SkipBlanks(m_p, m_pEnd);
 		if (length == 0 || length > 255 || !Is(':'))
 		{
-			Error("the name of a record is missing");
+			m_rBuilder.Error("the name of a record is missing", pName - m_pBegin);
 			m_p = Text::SkipLine(m_p, m_pEnd);
 			// A byte that begins no name must not stop the reading where it stands.
 			return true;
@@ -71,7 +71,11 @@ private:
 			return false;
 		m_p = Text::SkipSpace(m_p, m_pEnd);
 		if (!Is('{'))
+		{
+			if (m_p == m_pEnd && element.m_ValueCount == 0)
+				Error("it ends inside a record");
 			return true;
+		}
 		++m_p;
 		return m_rBuilder.Open(m_pEnd - m_pBegin);
 	}

@@ -197,7 +197,7 @@ void FbxFile::VSceneBuilder::Connect()
 	}
 	if (secondParents > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
-		    "%1% connections give a node a second parent and are left out, such as that of node %2%", secondParents,
+		    "Connections left out because their node has another parent: %1%, such as that of %2%", secondParents,
 		    pSecondParent->GetName());
 }
 
@@ -214,8 +214,7 @@ void FbxFile::VSceneBuilder::TellUnreached()
 		if (!rNodes[i]->m_pData->m_pParent)
 			loose += countBelow(*rNodes[i]);
 	if (loose > 0)
-		NVX_LOG("FBXIO", NVX::ELogInformation, "%1% nodes are not connected to the scene and are left out", loose);
+		NVX_LOG("FBXIO", NVX::ELogInformation, "Nodes left out because no connection leads to them: %1%", loose);
 	if (const std::size_t ring = rNodes.size() - reached - loose; ring > 0)
-		NVX_LOG("FBXIO", NVX::ELogWarning,
-		    "%1% nodes are left out, because their connections lead round in a ring and not to the scene", ring);
+		NVX_LOG("FBXIO", NVX::ELogWarning, "Nodes left out because their connections lead round in a ring: %1%", ring);
 }

@@ -1,0 +1,132 @@
+#include "fbxsdk/container/Arrays.h"
+#include "fbxsdk/container/FileKind.h"
+
+#include "FbxFileBuilder.h"
+
+#include <gtest/gtest.h>
+
+#include <numeric>
+
+using namespace FbxFile;
+using namespace FbxTest;
+using namespace std::string_literals;
+
+namespace
+{
+
+/// A file with one record "A" with that value, and its tree.
+struct VArrayFile
+{
+	VArrayFile(const VTestForm& i_rForm, const VTestValue& i_rValue) : m_Bytes(Write(i_rForm, {{"A", {i_rValue}, {}}}))
+	{
+		m_Tree.Read(m_Bytes, DetectFileKind(m_Bytes));
+	}
+	template <typename T>
+	bool Read(std::vector<T>& o_rNumbers, std::uint64_t i_Budget = Limits::c_DecodedBytes) const
+	{
+		VDecodeBudget budget{i_Budget};
+		return ReadArray(m_Tree, m_Tree.Find(VElementTree::c_Root, "A"), budget, o_rNumbers);
+	}
+	std::string m_Bytes;
+	VElementTree m_Tree;
+};
+
+template <typename T>
+std::string ArrayHeader(char i_Type, T i_Count, std::uint32_t i_Encoding, std::size_t i_Size)
+{
+	return Bytes(i_Type, std::uint32_t(i_Count), i_Encoding, std::uint32_t(i_Size));
+}
+
+TEST(Arrays, GiveTheSameNumbersFromEveryForm)
+{
+	VNumbers numbers(5000);
+	std::iota(numbers.begin(), numbers.end(), -2000.0);
+	for (const VTestForm& rForm : c_Forms)
+	{
+		const VArrayFile file(rForm, numbers);
+		VNumbers reals;
+		EXPECT_TRUE(file.Read(reals)) << rForm.m_pName;
+		EXPECT_EQ(reals, numbers) << rForm.m_pName;
+		std::vector<std::int32_t> integers;
+		EXPECT_TRUE(file.Read(integers)) << rForm.m_pName;
+		EXPECT_EQ(std::vector<double>(integers.begin(), integers.end()), numbers) << rForm.m_pName;
+	}
+}
+
+TEST(Arrays, ConvertEveryType)
+{
+	const auto plain = [](char i_Type, const std::string& i_rItems, std::size_t i_Count)
+	{ return VRaw{ArrayHeader(i_Type, i_Count, 0, i_rItems.size()) + i_rItems}; };
+	const std::pair<VRaw, VNumbers> rows[]{{plain('f', Bytes(1.5f, -2.0f), 2), {1.5, -2.0}},
+	    {plain('i', Bytes(7, -8), 2), {7.0, -8.0}}, {plain('l', Bytes(std::int64_t(1) << 40), 1), {1099511627776.0}},
+	    {plain('b', "\1\xff"s, 2), {1.0, -1.0}}, {plain('c', "\3", 1), {3.0}}, {plain('d', "", 0), {}}};
+	for (const auto& [value, expected] : rows)
+	{
+		VNumbers numbers;
+		EXPECT_TRUE(VArrayFile(c_Forms[2], value).Read(numbers)) << value.m_Bytes[0];
+		EXPECT_EQ(numbers, expected) << value.m_Bytes[0];
+	}
+	std::vector<std::int32_t> integers;
+	EXPECT_TRUE(VArrayFile(c_Forms[4], VNumbers{1e300, -3.7, 2147483647.0}).Read(integers));
+	EXPECT_EQ(integers, (std::vector<std::int32_t>{0, -3, 2147483647}));
+}
+
+struct VDamageRow
+{
+	const char* m_pName;
+	VTestValue m_Value;
+	/// Refused when the file is read already, not only when the array is.
+	bool m_bAtOnce;
+	std::uint64_t m_Budget = Limits::c_DecodedBytes;
+};
+
+void PrintTo(const VDamageRow& i_rRow, std::ostream* o_pStream)
+{
+	*o_pStream << i_rRow.m_pName;
+}
+
+class DamagedArray : public testing::TestWithParam<VDamageRow>
+{
+};
+
+TEST_P(DamagedArray, IsRefused)
+{
+	const VArrayFile file(c_Forms[1], GetParam().m_Value);
+	EXPECT_EQ(!file.m_Tree.Error().empty(), GetParam().m_bAtOnce);
+	VNumbers numbers{1.0};
+	// What was refused at once counts as a record without values.
+	EXPECT_EQ(file.Read(numbers, GetParam().m_Budget), GetParam().m_bAtOnce);
+	EXPECT_TRUE(numbers.empty());
+	EXPECT_LT(numbers.capacity() * sizeof(double), 2'000'000u);
+}
+
+const std::string c_Zeros = Deflate(std::string(1'000'000, '\0'));
+
+INSTANTIATE_TEST_SUITE_P(Rows, DamagedArray,
+    testing::Values(VDamageRow{"FourBillionPlain", VRaw{ArrayHeader('d', -1, 0, 8) + Bytes(1.0)}, true},
+        VDamageRow{"FourBillionDeflated", VRaw{ArrayHeader('d', -1, 1, c_Zeros.size()) + c_Zeros}, true},
+        VDamageRow{"BytesBeyondRecord", VRaw{ArrayHeader('d', 2, 0, 16) + Bytes(1.0)}, true},
+        VDamageRow{"UnknownEncoding", VRaw{ArrayHeader('d', 1, 2, 8) + Bytes(1.0)}, true},
+        VDamageRow{"BombOfMoreThanItClaims", VRaw{ArrayHeader('d', 10, 1, c_Zeros.size()) + c_Zeros}, false},
+        VDamageRow{"LessThanItClaims", VRaw{ArrayHeader('d', 125'001, 1, c_Zeros.size()) + c_Zeros}, false},
+        VDamageRow{"NoStream", VRaw{ArrayHeader('d', 1, 1, 8) + "notdefla"}, false},
+        VDamageRow{"BeyondBudget", VRaw{ArrayHeader('d', 125'000, 1, c_Zeros.size()) + c_Zeros}, false, 999'999},
+        VDamageRow{
+            "ConvertedBeyondBudget", VRaw{ArrayHeader('i', 250'000, 1, c_Zeros.size()) + c_Zeros}, false, 2'500'000},
+        VDamageRow{"TextAsNumber", VTestValue("12"s), false}),
+    [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
+
+TEST(Arrays, OfTextMustHoldTheirCount)
+{
+	for (const char* pText : {"*3 { a: 1,2 }", "*1 { a: 1,2 }", "*2 { a: 1,x }"})
+	{
+		const std::string bytes = "; FBX 7.4.0\nA: "s + pText;
+		VElementTree tree;
+		ASSERT_TRUE(tree.Read(bytes, DetectFileKind(bytes)));
+		VDecodeBudget budget;
+		VNumbers numbers;
+		EXPECT_FALSE(ReadArray(tree, 1, budget, numbers)) << pText;
+	}
+}
+
+} // namespace

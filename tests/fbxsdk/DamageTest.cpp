@@ -1,0 +1,134 @@
+
+#include "FbxFileBuilder.h"
+#include "TestFile.h"
+#include "TestLog.h"
+
+#include <fbxsdk.h>
+
+#include <gtest/gtest.h>
+
+#include <random>
+
+using namespace FbxTest;
+using namespace std::string_literals;
+
+namespace
+{
+
+VTestScene SmallScene()
+{
+	return {{{"hips", "LimbNode", -1, {{"Lcl Translation", {1, 2, 3}}}},
+	            {"knee", "LimbNode", 0, {{"RotationOrder", {2}}}}, {"foot", "LimbNode", 1, {}}},
+	    {{"UpAxis", {2}}}, {}, {}};
+}
+
+struct VResult
+{
+	bool m_bInitialized;
+	bool m_bComplete;
+	int m_Nodes;
+};
+
+/// Imports and evaluates everything.
+VResult Load(const std::string& i_rBytes)
+{
+	const VTestLog quiet;
+	const VTestFile file(i_rBytes);
+	FbxManager* const pManager = FbxManager::Create();
+	FbxScene* const pScene = FbxScene::Create(pManager, "");
+	FbxImporter* const pImporter = FbxImporter::Create(pManager, "");
+	VResult result{};
+	result.m_bInitialized = pImporter->Initialize(file.Path().c_str());
+	if (result.m_bInitialized)
+	{
+		result.m_bComplete = pImporter->Import(pScene);
+		EXPECT_EQ(result.m_bComplete, pImporter->GetStatus().GetCode() == FbxStatus::eSuccess);
+	}
+	else
+		EXPECT_STRNE(pImporter->GetStatus().GetErrorString(), "");
+	std::vector<FbxNode*> open{pScene->GetRootNode()};
+	while (!open.empty())
+	{
+		FbxNode* const pNode = open.back();
+		open.pop_back();
+		++result.m_Nodes;
+		pNode->EvaluateGlobalTransform();
+		for (int i = 0; i < pNode->GetChildCount(); ++i)
+			open.push_back(pNode->GetChild(i));
+	}
+	pManager->Destroy();
+	return result;
+}
+
+/// Where a file has told what it is.
+std::size_t VersionEnd(const std::string& i_rBytes)
+{
+	return i_rBytes.starts_with(';') ? i_rBytes.find("EncryptionType") : 27;
+}
+
+class Damage : public testing::TestWithParam<VTestForm>
+{
+};
+
+TEST_P(Damage, CutAnywhereIsToldAsIncomplete)
+{
+	const std::string bytes = Write(GetParam(), SmallScene());
+	// Behind this stands nothing that is read: the footer, or a last end of line.
+	const std::size_t end = GetParam().m_Form == EForm::Binary ? bytes.size() - 40 : bytes.size() - 1;
+	const std::size_t versionEnd = VersionEnd(bytes);
+	for (std::size_t size = 0; size <= bytes.size(); ++size)
+	{
+		const VResult result = Load(bytes.substr(0, size));
+		EXPECT_EQ(result.m_bComplete, size >= end) << size;
+		EXPECT_TRUE(result.m_bInitialized || size < versionEnd) << size;
+		EXPECT_TRUE(result.m_Nodes == 4 || size < end) << size;
+	}
+}
+
+TEST_P(Damage, RandomBytesNeverBreakTheReader)
+{
+	const std::string bytes = Write(GetParam(), SmallScene());
+	const std::size_t start = VersionEnd(bytes);
+	std::mt19937 generator(11);
+	int incomplete = 0;
+	for (int round = 0; round < 3000; ++round)
+	{
+		std::string damaged = bytes;
+		for (int i = generator() % 4; i >= 0; --i)
+			damaged[start + generator() % (bytes.size() - start)] = char(generator() % 3 == 0 ? 0xFF : generator());
+		const VResult result = Load(damaged);
+		EXPECT_TRUE(result.m_bInitialized);
+		EXPECT_LE(result.m_Nodes, 5);
+		incomplete += !result.m_bComplete;
+	}
+	EXPECT_GT(incomplete, 300);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Forms, Damage, testing::ValuesIn(c_Forms), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
+
+/// What a hostile MiB can hold most of: all of it must stay linear.
+TEST(Damage, AMillionBytesOfAnythingAreReadInOneGo)
+{
+	const auto repeat = [](const std::string& i_rText)
+	{
+		std::string text;
+		while (text.size() < 1 << 20)
+			text += i_rText;
+		return text;
+	};
+	const std::string head = "; FBX 7.4.0\n";
+	for (const std::string& rUnit :
+	    {"}"s, "{"s, "A:\n"s, "A: ,\n"s, "\"x\""s, ";\n"s, "A: *9 {\n"s, "A: 1,;\n"s, "A:{}\n"s})
+		EXPECT_TRUE(Load(head + repeat(rUnit)).m_bInitialized) << rUnit;
+	// Objects with one and the same number, and connections among them.
+	EXPECT_EQ(Load(head + "Objects: {\n" + repeat("Model: 5,\"Model::a\",\"Null\"\n") + "}\nConnections: {\n"
+	              + repeat("C: \"OO\",5,0\n") + "}\n")
+	              .m_Nodes,
+	    2);
+	const std::string binary = Write(c_Forms[1], std::vector<VTestRecord>{}).substr(0, 27);
+	EXPECT_FALSE(Load(binary + repeat("\xff")).m_bComplete);
+	EXPECT_FALSE(Load(binary + repeat("\1"s + std::string(12, '\0'))).m_bComplete);
+}
+
+} // namespace

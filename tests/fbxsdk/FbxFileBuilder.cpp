@@ -1,0 +1,229 @@
+#include "FbxFileBuilder.h"
+
+#include "math/NumberText.h"
+
+#include <libdeflate.h>
+
+#include <memory>
+
+using namespace FbxTest;
+
+namespace
+{
+
+std::string BinaryValue(const VTestValue& i_rValue)
+{
+	if (const auto* const pInteger = std::get_if<std::int64_t>(&i_rValue))
+		return Bytes('L', *pInteger);
+	if (const auto* const pReal = std::get_if<double>(&i_rValue))
+		return Bytes('D', *pReal);
+	if (const auto* const pRaw = std::get_if<VRaw>(&i_rValue))
+		return pRaw->m_Bytes;
+	if (const auto* const pNumbers = std::get_if<VNumbers>(&i_rValue))
+	{
+		const std::string deflated = Deflate({reinterpret_cast<const char*>(pNumbers->data()), 8 * pNumbers->size()});
+		return Bytes('d', std::uint32_t(pNumbers->size()), 1u, std::uint32_t(deflated.size()), deflated);
+	}
+	std::string text = std::get<std::string>(i_rValue);
+	if (const std::size_t at = text.find("::"); at != std::string::npos)
+		text = text.substr(at + 2) + std::string("\0\1", 2) + text.substr(0, at);
+	return Bytes('S', std::uint32_t(text.size()), text);
+}
+
+class VBinaryWriter
+{
+public:
+	explicit VBinaryWriter(std::uint32_t i_Version) : m_Version(i_Version)
+	{
+		m_Bytes = Bytes(std::string("Kaydara FBX Binary  \0\x1a\0", 23), i_Version);
+	}
+
+	void Write(const VTestRecord& i_rRecord)
+	{
+		std::string values;
+		std::size_t count = 0;
+		for (const VTestValue& rValue : i_rRecord.m_Values)
+		{
+			const auto* const pNumbers = std::get_if<VNumbers>(&rValue);
+			if (pNumbers && m_Version < 7000)
+				for (const double number : *pNumbers)
+					values += BinaryValue(number);
+			else
+				values += BinaryValue(rValue);
+			count += pNumbers && m_Version < 7000 ? pNumbers->size() : 1;
+		}
+		const std::size_t start = m_Bytes.size();
+		Header(0, count, values.size(), i_rRecord.m_Name);
+		m_Bytes += values;
+		for (const VTestRecord& rChild : i_rRecord.m_Children)
+			Write(rChild);
+		if (!i_rRecord.m_Children.empty())
+			Header(0, 0, 0, {});
+		const std::string end = Number(m_Bytes.size());
+		m_Bytes.replace(start, end.size(), end);
+	}
+
+	std::string Finish()
+	{
+		Header(0, 0, 0, {});
+		// In the place of the footer's fixed bytes.
+		return m_Bytes + std::string(40, '\x5a');
+	}
+
+private:
+	std::string Number(std::size_t i_Number) const
+	{
+		return m_Version >= 7500 ? Bytes(std::uint64_t(i_Number)) : Bytes(std::uint32_t(i_Number));
+	}
+
+	void Header(std::size_t i_End, std::size_t i_Count, std::size_t i_Size, const std::string& i_rName)
+	{
+		m_Bytes += Bytes(Number(i_End), Number(i_Count), Number(i_Size), char(i_rName.size()), i_rName);
+	}
+
+	std::uint32_t m_Version;
+	std::string m_Bytes;
+};
+
+std::string Joined(const VNumbers& i_rNumbers)
+{
+	std::string text;
+	for (const double number : i_rNumbers)
+	{
+		text += text.empty() ? "" : ",";
+		NumberText::AppendG17(text, number);
+	}
+	return text;
+}
+
+void WriteText(
+    std::uint32_t i_Version, const VTestRecord& i_rRecord, const std::string& i_rIndent, std::string& io_rText)
+{
+	io_rText += i_rIndent + i_rRecord.m_Name + ": ";
+	std::string separator;
+	for (const VTestValue& rValue : i_rRecord.m_Values)
+	{
+		io_rText += separator;
+		separator = ", ";
+		if (const auto* const pInteger = std::get_if<std::int64_t>(&rValue))
+			io_rText += std::to_string(*pInteger);
+		else if (const auto* const pReal = std::get_if<double>(&rValue))
+			io_rText += NumberText::PrintG17(*pReal);
+		else if (const auto* const pNumbers = std::get_if<VNumbers>(&rValue))
+			io_rText += i_Version < 7000
+			    ? Joined(*pNumbers)
+			    : "*" + std::to_string(pNumbers->size()) + " {\n" + i_rIndent + "\ta: " + Joined(*pNumbers) + "\n}";
+		else if (const auto* const pText = std::get_if<std::string>(&rValue))
+			io_rText += '"' + *pText + '"';
+	}
+	if (!i_rRecord.m_Children.empty())
+	{
+		io_rText += " {\n";
+		for (const VTestRecord& rChild : i_rRecord.m_Children)
+			WriteText(i_Version, rChild, i_rIndent + '\t', io_rText);
+		io_rText += i_rIndent + "}";
+	}
+	io_rText += '\n';
+}
+
+VTestRecord PropertyList(std::uint32_t i_Version, const std::vector<std::pair<std::string, VNumbers>>& i_rProperties)
+{
+	const bool bNew = i_Version >= 7000;
+	VTestRecord list{bNew ? "Properties70" : "Properties60", {}, {}};
+	for (const auto& [name, numbers] : i_rProperties)
+	{
+		VTestRecord& rProperty = list.m_Children.emplace_back(
+		    VTestRecord{bNew ? "P" : "Property", {name, std::string("Type"), std::string()}, {}});
+		if (bNew)
+			rProperty.m_Values.push_back(std::string("A+"));
+		rProperty.m_Values.insert(rProperty.m_Values.end(), numbers.begin(), numbers.end());
+	}
+	return list;
+}
+
+} // namespace
+
+std::string FbxTest::Write(const VTestForm& i_rForm, const std::vector<VTestRecord>& i_rRecords)
+{
+	if (i_rForm.m_Form == EForm::Binary)
+	{
+		VBinaryWriter writer(i_rForm.m_Version);
+		for (const VTestRecord& rRecord : i_rRecords)
+			writer.Write(rRecord);
+		return writer.Finish();
+	}
+	std::string text = "; FBX " + std::to_string(i_rForm.m_Version / 1000) + '.'
+	    + std::to_string(i_rForm.m_Version / 100 % 10) + ".0 project file\n";
+	for (const VTestRecord& rRecord : i_rRecords)
+		WriteText(i_rForm.m_Version, rRecord, {}, text);
+	return text;
+}
+
+std::vector<VTestRecord> FbxTest::Records(const VTestForm& i_rForm, const VTestScene& i_rScene)
+{
+	const bool bNew = i_rForm.m_Version >= 7000;
+	const auto record = [](const char* i_pName, std::vector<VTestValue> i_Values) -> VTestRecord {
+		return {i_pName, std::move(i_Values), {}};
+	};
+	const auto nodeKey = [&](int i_Node) -> VTestValue
+	{
+		if (bNew)
+			return std::int64_t(i_Node + 1);
+		return i_Node < 0 ? "Model::Scene" : "Model::" + i_rScene.m_Nodes[i_Node].m_Name;
+	};
+
+	VTestRecord objects{"Objects", {}, {}};
+	VTestRecord connections{"Connections", {}, {}};
+	const auto connect = [&](VTestValue i_Child, VTestValue i_Parent)
+	{
+		connections.m_Children.push_back(
+		    record(bNew ? "C" : "Connect", {std::string("OO"), std::move(i_Child), std::move(i_Parent)}));
+	};
+	for (int i = 0; i < int(i_rScene.m_Nodes.size()); ++i)
+	{
+		const VTestNode& rNode = i_rScene.m_Nodes[i];
+		VTestRecord node = record("Model", {"Model::" + rNode.m_Name, rNode.m_Kind});
+		node.m_Children.push_back(PropertyList(i_rForm.m_Version, rNode.m_Properties));
+		if (bNew)
+		{
+			const std::int64_t attribute = 1'000'000 + i;
+			node.m_Values.insert(node.m_Values.begin(), std::int64_t(i + 1));
+			objects.m_Children.push_back(
+			    record("NodeAttribute", {attribute, std::string("NodeAttribute::"), rNode.m_Kind}));
+			connect(attribute, nodeKey(i));
+		}
+		objects.m_Children.push_back(node);
+		connect(nodeKey(i), nodeKey(rNode.m_Parent));
+	}
+	for (const auto& [child, parent] : i_rScene.m_Connections)
+		connect(nodeKey(child), nodeKey(parent));
+
+	VTestRecord header{"FBXHeaderExtension", {}, {}};
+	header.m_Children.push_back(record("FBXVersion", {std::int64_t(i_rForm.m_Version)}));
+	header.m_Children.push_back(record("EncryptionType", {i_rScene.m_EncryptionType}));
+	VTestRecord settings{"GlobalSettings", {}, {PropertyList(i_rForm.m_Version, i_rScene.m_Settings)}};
+	std::vector<VTestRecord> records{header};
+	if (bNew)
+	{
+		VTestRecord type = record("ObjectType", {std::string("Model")});
+		type.m_Children.push_back(
+		    {"PropertyTemplate", {std::string("FbxNode")}, {PropertyList(i_rForm.m_Version, i_rScene.m_Template)}});
+		records.push_back({"Definitions", {}, {type}});
+		records.push_back(settings);
+	}
+	else
+		objects.m_Children.push_back(settings);
+	records.push_back(objects);
+	records.push_back(connections);
+	return records;
+}
+
+std::string FbxTest::Deflate(const std::string& i_rBytes)
+{
+	const std::unique_ptr<libdeflate_compressor, decltype(&libdeflate_free_compressor)> pCompressor(
+	    libdeflate_alloc_compressor(6), &libdeflate_free_compressor);
+	std::string deflated(libdeflate_zlib_compress_bound(pCompressor.get(), i_rBytes.size()), '\0');
+	deflated.resize(libdeflate_zlib_compress(
+	    pCompressor.get(), i_rBytes.data(), i_rBytes.size(), deflated.data(), deflated.size()));
+	return deflated;
+}

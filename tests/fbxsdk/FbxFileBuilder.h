@@ -1,0 +1,101 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <type_traits>
+#include <utility>
+#include <variant>
+#include <vector>
+
+/// Writes small FBX files for tests, the same content in every form of the format.
+namespace FbxTest
+{
+
+/// Written as a deflated array in binary and as "*n { a: }" in text; before version 7 as a list of values.
+using VNumbers = std::vector<double>;
+/// Bytes that go into a binary file as they stand, type byte included.
+struct VRaw
+{
+	std::string m_Bytes;
+};
+using VTestValue = std::variant<std::int64_t, double, std::string, VNumbers, VRaw>;
+
+struct VTestRecord
+{
+	std::string m_Name;
+	std::vector<VTestValue> m_Values;
+	std::vector<VTestRecord> m_Children;
+};
+
+enum class EForm
+{
+	Binary,
+	Text
+};
+
+struct VTestForm
+{
+	const char* m_pName;
+	EForm m_Form;
+	std::uint32_t m_Version;
+};
+
+inline constexpr VTestForm c_Forms[]{{"Binary6100", EForm::Binary, 6100}, {"Binary7400", EForm::Binary, 7400},
+    {"Binary7500", EForm::Binary, 7500}, {"Text6100", EForm::Text, 6100}, {"Text7400", EForm::Text, 7400}};
+
+std::string Write(const VTestForm& i_rForm, const std::vector<VTestRecord>& i_rRecords);
+
+struct VTestNode
+{
+	std::string m_Name;
+	/// "LimbNode", "Null" ...
+	std::string m_Kind;
+	/// Index of the parent, -1 for the scene.
+	int m_Parent = -1;
+	std::vector<std::pair<std::string, VNumbers>> m_Properties;
+};
+
+struct VTestScene
+{
+	std::vector<VTestNode> m_Nodes;
+	std::vector<std::pair<std::string, VNumbers>> m_Settings;
+	/// Defaults of all nodes; only version 7 has them.
+	std::vector<std::pair<std::string, VNumbers>> m_Template;
+	/// Further connections: child and parent by index, -1 for the scene.
+	std::vector<std::pair<int, int>> m_Connections;
+	std::int64_t m_EncryptionType = 0;
+};
+
+/// The records of the scene as that version has them.
+std::vector<VTestRecord> Records(const VTestForm& i_rForm, const VTestScene& i_rScene);
+
+inline std::string Write(const VTestForm& i_rForm, const VTestScene& i_rScene)
+{
+	return Write(i_rForm, Records(i_rForm, i_rScene));
+}
+
+/// A zlib stream.
+std::string Deflate(const std::string& i_rBytes);
+
+inline void AppendBytes(std::string& io_rBytes, const std::string& i_rText)
+{
+	io_rBytes += i_rText;
+}
+
+template <typename T>
+requires std::is_arithmetic_v<T>
+void AppendBytes(std::string& io_rBytes, T i_Number)
+{
+	io_rBytes.append(reinterpret_cast<const char*>(&i_Number), sizeof(T));
+}
+
+/// Numbers as the binary form has them, and texts as they are, one behind the other.
+template <typename... TParts>
+std::string Bytes(const TParts&... i_rParts)
+{
+	std::string bytes;
+	(AppendBytes(bytes, i_rParts), ...);
+	return bytes;
+}
+
+} // namespace FbxTest
