@@ -206,6 +206,16 @@ TEST(MathParser, NodesTellTextAndNames)
 	EXPECT_EQ(AsSimple(pNode.get())->Value(), 0);
 }
 
+TEST(MathParser, CanKeepValuesOnly)
+{
+	VWorkplace<VMathFactorySimple> workplace;
+	workplace.m_Factory.SetKeepsExpressions(false);
+	ASSERT_TRUE(workplace.Parse("-(2*Arm+10)^2/tan('it\\'s')-cos(GlobalScale)"));
+	EXPECT_EQ(workplace.Value(), 196.0 * (1.0 / std::tan(3.0)) - std::cos(4.0));
+	ASSERT_TRUE(workplace.Parse("-'Arm Length'+sin(0)"));
+	EXPECT_EQ(workplace.m_Result.m_Node.Text(), "-6");
+}
+
 TEST(MathParser, VariablesComeBeforeConstantsAndCanBeCleared)
 {
 	VWorkplace<VMathFactorySimple> workplace;

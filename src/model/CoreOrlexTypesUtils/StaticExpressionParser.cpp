@@ -51,6 +51,21 @@ public:
 	std::string m_Text;
 };
 
+class VKeepExpressions
+{
+public:
+	explicit VKeepExpressions(Math::VMathFactorySimple& io_rFactory) : m_rFactory(io_rFactory)
+	{
+		m_rFactory.SetKeepsExpressions(true);
+	}
+	~VKeepExpressions() { m_rFactory.SetKeepsExpressions(false); }
+	VKeepExpressions(const VKeepExpressions&) = delete;
+	VKeepExpressions& operator=(const VKeepExpressions&) = delete;
+
+private:
+	Math::VMathFactorySimple& m_rFactory;
+};
+
 /// Empties the error text on success: a parser says something then too.
 bool Parse(const Math::VMathParser& i_rParser, std::string_view i_Expression, Math::IMathResult& o_rResult,
     std::string& o_rError)
@@ -70,7 +85,10 @@ void VStaticExpressionParser::VSingleElementIVector::Assign(const double* i_pVal
 		m_Value = *i_pValues;
 }
 
-VStaticExpressionParser::VStaticExpressionParser() : m_StaticParser(m_StaticFactory) {}
+VStaticExpressionParser::VStaticExpressionParser() : m_StaticParser(m_StaticFactory)
+{
+	m_StaticFactory.SetKeepsExpressions(false);
+}
 
 VStaticExpressionParser::~VStaticExpressionParser() = default;
 
@@ -242,6 +260,7 @@ template <typename TLinearFactory>
 bool VDynamicExpressionParserBase<TLinearFactory>::EvaluateChecked(
     std::string_view i_Expression, std::set<std::string>& io_rNames, std::string& o_rError) const
 {
+	const VKeepExpressions keep(m_LinearFactory);
 	VNamesResult result(io_rNames);
 	return Parse(m_LinearParser, i_Expression, result, o_rError);
 }
@@ -250,6 +269,7 @@ template <typename TLinearFactory>
 bool VDynamicExpressionParserBase<TLinearFactory>::EvaluateFull(
     std::string_view i_Expression, std::set<std::string>& io_rNames) const
 {
+	const VKeepExpressions keep(m_FullFactory);
 	VTextResult result;
 	std::string error;
 	if (!Parse(m_FullParser, i_Expression, result, error))

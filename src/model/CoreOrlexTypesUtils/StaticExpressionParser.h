@@ -100,7 +100,11 @@ template <typename TLinearFactory>
 class VDynamicExpressionParserBase : public VStaticExpressionParser
 {
 public:
-	VDynamicExpressionParserBase() : m_LinearParser(m_LinearFactory), m_FullParser(m_FullFactory) {}
+	VDynamicExpressionParserBase() : m_LinearParser(m_LinearFactory), m_FullParser(m_FullFactory)
+	{
+		m_LinearFactory.SetKeepsExpressions(false);
+		m_FullFactory.SetKeepsExpressions(false);
+	}
 
 	void Reset() override
 	{
@@ -154,9 +158,10 @@ private:
 		m_FullFactory.SetConstant(i_rName, VSingleElementIVector(i_Value));
 	}
 
-	TLinearFactory m_LinearFactory;
+	// Told to keep expressions only while one is asked for its names or text.
+	mutable TLinearFactory m_LinearFactory;
 	Math::VMathParser m_LinearParser;
-	Math::VMathFactorySimple m_FullFactory;
+	mutable Math::VMathFactorySimple m_FullFactory;
 	Math::VMathParser m_FullParser;
 };
 

@@ -7,36 +7,42 @@
 namespace Math
 {
 
-namespace
-{
-
 using VNode = VMathNodeSimple;
 
+template <typename... TExpression>
+VMathNodePointer VMathFactorySimple::Make(VNode::EKind i_Kind, double i_Value, TExpression&&... i_rExpression) const
+{
+	return m_bKeepsExpressions ? std::make_shared<VNode>(i_Kind, i_Value, std::forward<TExpression>(i_rExpression)...)
+	                           : std::make_shared<VNode>(VNode::ENumber, i_Value);
+}
+
 template <typename TOperation>
-VMathNodePointer Unary(VNode::EKind i_Kind, VMathNodePointer&& i_pA, TOperation i_Operation)
+VMathNodePointer VMathFactorySimple::Unary(VNode::EKind i_Kind, VMathNodePointer i_pA, TOperation i_Operation) const
 {
 	const VNode* const pA = AsSimple(i_pA.get());
 	if (!pA)
 		return nullptr;
-	return std::make_shared<VNode>(i_Kind, i_Operation(pA->Value()), std::move(i_pA), nullptr);
+	const double value = i_Operation(pA->Value());
+	return Make(i_Kind, value, std::move(i_pA), nullptr);
 }
 
 template <typename TOperation>
-VMathNodePointer Binary(VNode::EKind i_Kind, VMathNodePointer&& i_pA, VMathNodePointer&& i_pB, TOperation i_Operation)
+VMathNodePointer VMathFactorySimple::Binary(
+    VNode::EKind i_Kind, VMathNodePointer i_pA, VMathNodePointer i_pB, TOperation i_Operation) const
 {
 	const VNode* const pA = AsSimple(i_pA.get());
 	const VNode* const pB = AsSimple(i_pB.get());
 	if (!pA || !pB)
 		return nullptr;
-	return std::make_shared<VNode>(i_Kind, i_Operation(pA->Value(), pB->Value()), std::move(i_pA), std::move(i_pB));
+	const double value = i_Operation(pA->Value(), pB->Value());
+	return Make(i_Kind, value, std::move(i_pA), std::move(i_pB));
 }
 
-VMathNodePointer Named(VNode::EKind i_Kind, std::string_view i_Name, const std::vector<double>& i_rValue)
+VMathNodePointer VMathFactorySimple::MakeNamed(
+    VNode::EKind i_Kind, std::string_view i_Name, const std::vector<double>& i_rValue) const
 {
-	return std::make_shared<VNode>(i_Kind, i_rValue.empty() ? 0.0 : i_rValue.front(), i_Name);
+	return Make(i_Kind, i_rValue.empty() ? 0.0 : i_rValue.front(), i_Name);
 }
-
-} // namespace
 
 VMathNodePointer VMathFactorySimple::Add(VMathNodePointer i_pA, VMathNodePointer i_pB)
 {
@@ -73,28 +79,28 @@ VMathNodePointer VMathFactorySimple::MakeNumberFromText(std::string_view i_Text)
 {
 	double value = 0.0;
 	NumberText::ScanReal(i_Text, value);
-	return std::make_shared<VNode>(VNode::EText, value, i_Text);
+	return Make(VNode::EText, value, i_Text);
 }
 
 VMathFunctionPointer VMathFactorySimple::GetFunction(std::string_view i_Name)
 {
 	if (i_Name == "sin" || i_Name == "SIN")
-		return VMathFunctionPointer(new VMathFunctionSimple(VMathFunctionSimple::ESine));
+		return VMathFunctionPointer(new VMathFunctionSimple(VMathFunctionSimple::ESine, m_bKeepsExpressions));
 	if (i_Name == "cos" || i_Name == "COS")
-		return VMathFunctionPointer(new VMathFunctionSimple(VMathFunctionSimple::ECosine));
+		return VMathFunctionPointer(new VMathFunctionSimple(VMathFunctionSimple::ECosine, m_bKeepsExpressions));
 	if (i_Name == "tan" || i_Name == "TAN")
-		return VMathFunctionPointer(new VMathFunctionSimple(VMathFunctionSimple::ETangent));
+		return VMathFunctionPointer(new VMathFunctionSimple(VMathFunctionSimple::ETangent, m_bKeepsExpressions));
 	return nullptr;
 }
 
 VMathNodePointer VMathFactorySimple::MakeVariable(std::string_view i_Name, const std::vector<double>& i_rValue)
 {
-	return Named(VNode::EText, i_Name, i_rValue);
+	return MakeNamed(VNode::EText, i_Name, i_rValue);
 }
 
 VMathNodePointer VMathFactorySimple::MakeConstant(std::string_view i_Name, const std::vector<double>& i_rValue)
 {
-	return Named(VNode::EText, i_Name, i_rValue);
+	return MakeNamed(VNode::EText, i_Name, i_rValue);
 }
 
 VMathNodePointer VMathFactorySimpleLinear::Power(VMathNodePointer, VMathNodePointer)
@@ -109,12 +115,12 @@ VMathFunctionPointer VMathFactorySimpleLinear::GetFunction(std::string_view)
 
 VMathNodePointer VMathFactorySimpleLinear::MakeVariable(std::string_view i_Name, const std::vector<double>& i_rValue)
 {
-	return Named(VNode::EVariable, i_Name, i_rValue);
+	return MakeNamed(VNode::EVariable, i_Name, i_rValue);
 }
 
 VMathNodePointer VMathFactorySimpleLinear::MakeConstant(std::string_view i_Name, const std::vector<double>& i_rValue)
 {
-	return Named(VNode::EConstant, i_Name, i_rValue);
+	return MakeNamed(VNode::EConstant, i_Name, i_rValue);
 }
 
 VMathNodePointer VMathFunctionSimple::Evaluate(std::span<const VMathNodePointer> i_Arguments) const
@@ -139,7 +145,8 @@ VMathNodePointer VMathFunctionSimple::Evaluate(std::span<const VMathNodePointer>
 		name = "tan";
 		break;
 	}
-	return std::make_shared<VNode>(value, name, i_Arguments[0]);
+	return m_bKeepsExpression ? std::make_shared<VNode>(value, name, i_Arguments[0])
+	                          : std::make_shared<VNode>(VNode::ENumber, value);
 }
 
 } // namespace Math

@@ -11,6 +11,10 @@ namespace Math
 class VMathFactorySimple : public VMathFactoryMaps
 {
 public:
+	/// Without expressions, nodes hold values only: an expression of any length costs no more memory than its depth,
+	/// and its node tells no text but the value's and no names.
+	void SetKeepsExpressions(bool i_bKeeps) { m_bKeepsExpressions = i_bKeeps; }
+
 	VMathNodePointer Add(VMathNodePointer i_pA, VMathNodePointer i_pB) override;
 	VMathNodePointer Multiply(VMathNodePointer i_pA, VMathNodePointer i_pB) override;
 	VMathNodePointer Power(VMathNodePointer i_pA, VMathNodePointer i_pB) override;
@@ -21,6 +25,21 @@ public:
 	VMathFunctionPointer GetFunction(std::string_view i_Name) override;
 	VMathNodePointer MakeVariable(std::string_view i_Name, const std::vector<double>& i_rValue) override;
 	VMathNodePointer MakeConstant(std::string_view i_Name, const std::vector<double>& i_rValue) override;
+
+protected:
+	VMathNodePointer MakeNamed(
+	    VMathNodeSimple::EKind i_Kind, std::string_view i_Name, const std::vector<double>& i_rValue) const;
+
+private:
+	template <typename... TExpression>
+	VMathNodePointer Make(VMathNodeSimple::EKind i_Kind, double i_Value, TExpression&&... i_rExpression) const;
+	template <typename TOperation>
+	VMathNodePointer Unary(VMathNodeSimple::EKind i_Kind, VMathNodePointer i_pA, TOperation i_Operation) const;
+	template <typename TOperation>
+	VMathNodePointer Binary(
+	    VMathNodeSimple::EKind i_Kind, VMathNodePointer i_pA, VMathNodePointer i_pB, TOperation i_Operation) const;
+
+	bool m_bKeepsExpressions = true;
 };
 
 /// Without powers and functions; its nodes tell which variables and constants an expression depends on. A product of
@@ -44,7 +63,11 @@ public:
 		ETangent
 	};
 
-	explicit VMathFunctionSimple(EKind i_Kind) : m_Kind(i_Kind) {}
+	/// @param i_bKeepsExpression as VMathFactorySimple::SetKeepsExpressions.
+	explicit VMathFunctionSimple(EKind i_Kind, bool i_bKeepsExpression = true)
+	    : m_Kind(i_Kind), m_bKeepsExpression(i_bKeepsExpression)
+	{
+	}
 
 	void Release() override { delete this; }
 	std::uint32_t NumberOfArguments() const override { return 1; }
@@ -52,6 +75,7 @@ public:
 
 private:
 	EKind m_Kind;
+	bool m_bKeepsExpression;
 };
 
 } // namespace Math
