@@ -1,5 +1,5 @@
 # Sourced by the commands. ensure_packages PURPOSE...: installs the packages of these purposes that are missing.
-# build PRESET [TARGET...]: configures once, then builds.
+# build PRESET [TARGET...]: builds what was configured.
 
 say() { printf '\n== %s\n' "$*"; }
 
@@ -20,6 +20,5 @@ ensure_packages() {
 build() {
 	local preset=$1
 	shift
-	[ -f "build/$preset/build.ninja" ] || cmake --preset "$preset" >/dev/null
 	cmake --build --preset "$preset" ${1:+--target "$@"}
 }
