@@ -250,6 +250,11 @@ TEST(MathParser, BoundsNesting)
 	EXPECT_FALSE(workplace.Parse(nested(c_MaxExpressionDepth + 1, "(")));
 	EXPECT_EQ(workplace.m_Diagnostic, "Parse Error at column 202: Expression is nested too deeply");
 	EXPECT_FALSE(workplace.Parse(std::string(1000000, '(')));
+	// Side by side is not nested.
+	std::string text = "sin(0)";
+	for (std::size_t i = 0; i <= c_MaxExpressionDepth; ++i)
+		text += "+(1)";
+	EXPECT_TRUE(workplace.Parse(text)) << workplace.m_Diagnostic;
 }
 
 /// Neither quadratic nor deep: any of these would take minutes or the stack if it were.
