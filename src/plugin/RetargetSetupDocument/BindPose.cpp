@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <numbers>
 
 using ComputeSubject::VComputeSubjectFK;
 using CoreOrlexTypes::VSubject;
@@ -31,7 +32,7 @@ double AngleBetween(const Rotation::VMatrix3& i_rA, const Rotation::VMatrix3& i_
 	const Rotation::VVector3 turn =
 	    Rotation::AngleAxisFromRotationMatrix(Rotation::Product(Rotation::Transposed(i_rA), i_rB));
 	const double angle = std::hypot(turn[0], turn[1], turn[2]);
-	return std::min(angle, 2.0 * M_PI - angle);
+	return std::min(angle, 2.0 * std::numbers::pi - angle);
 }
 
 } // namespace

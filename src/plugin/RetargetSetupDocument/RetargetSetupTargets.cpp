@@ -10,6 +10,7 @@
 #include "RetargetSetupDocument/RetargetTargets.h"
 
 #include <cmath>
+#include <numbers>
 
 using ComputeSubject::VComputeSubjectFK;
 using CoreOrlexTypes::VSubject;
@@ -57,7 +58,8 @@ void TellChangedPose(const VComputeSubjectFK& i_rBefore, const VSubjectParametri
 	if (worst)
 		NVX_LOG(c_LogCategory, NVX::ELogWarning,
 		    "Removing joints changed the bind pose: segment '%1%' most, by %2$.1f mm and %3$.2f degrees",
-		    i_rAfter.m_Segments[worst->m_SegmentIndex].m_Name, worst->m_Distance, worst->m_Angle * 180.0 / M_PI);
+		    i_rAfter.m_Segments[worst->m_SegmentIndex].m_Name, worst->m_Distance,
+		    worst->m_Angle * 180.0 / std::numbers::pi);
 }
 
 } // namespace

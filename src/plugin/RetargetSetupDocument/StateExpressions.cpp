@@ -80,6 +80,12 @@ bool StoreAngleText(
 	std::string text = i_rText;
 	// Files separate the expressions of a list by blanks.
 	std::erase_if(text, [](char i_Byte) { return i_Byte == ' ' || (i_Byte >= '\t' && i_Byte <= '\r'); });
+	double valueOfText = 0.0;
+	if (!parser.Evaluate(text, valueOfText, error) || valueOfText != value)
+	{
+		TellNotStored(i_TargetIndex, i_Component, "'" + i_rText + "' means something else without its blanks");
+		return false;
+	}
 	StoreExpression(io_rSubject.m_Targets[i_TargetIndex], i_Component, std::move(text));
 	return true;
 }

@@ -1,0 +1,299 @@
+#include "TestDocument.h"
+
+#include "RetargetSetupDocument/AngleAxis.h"
+#include "UtilsFileSystem/Paths.h"
+
+#include <QMetaMethod>
+#include <QMetaProperty>
+
+#include <limits>
+#include <numbers>
+
+namespace
+{
+
+using CoreOrlexTypes::VSubjectApplicationData;
+using CoreOrlexTypes::VSubjectParametrised;
+using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
+
+using Document = VDocumentTest;
+
+TEST(DocumentInterface, IsWhatQmlCalls)
+{
+	const QMetaObject& rMeta = VRetargetSetup::staticMetaObject;
+	EXPECT_STREQ(rMeta.className(), "VRetargetSetup");
+	for (const char* const pSignature : {"CreateTargetSubject()", "LoadTargetSubjectURL(QUrl)",
+	         "SaveTargetSubjectURL(QUrl)", "AddTarget(int,int,bool,bool)", "RemoveTarget(int)", "CreateAllJoints()",
+	         "RemoveUnnecessaryJoints()", "UpdateTargets()"})
+	{
+		const int index = rMeta.indexOfMethod(pSignature);
+		ASSERT_NE(index, -1) << pSignature;
+		EXPECT_STREQ(rMeta.method(index).typeName(), "void");
+	}
+	const QMetaProperty property = rMeta.property(rMeta.indexOfProperty("jointSymmetry"));
+	EXPECT_TRUE(property.isWritable());
+	EXPECT_EQ(property.notifySignal().name(), "jointSymmetryChanged");
+}
+
+TEST_F(Document, JointSymmetryTellsOfChangesOnly)
+{
+	int told = 0;
+	QObject::connect(&m_Document, &VRetargetSetup::jointSymmetryChanged, [&told] { ++told; });
+	EXPECT_TRUE(m_Document.property("jointSymmetry").toBool());
+	m_Document.setProperty("jointSymmetry", true);
+	EXPECT_EQ(told, 0);
+	m_Document.setProperty("jointSymmetry", false);
+	EXPECT_EQ(told, 1);
+	EXPECT_FALSE(m_Document.JointSymmetry());
+	EXPECT_EQ(m_Changes, 0);
+}
+
+TEST_F(Document, CommandsOnNothingDoNothing)
+{
+	VLogRecorder log;
+	m_Document.CreateTargetSubject();
+	m_Document.AddTarget(0, 0, true, true);
+	m_Document.RemoveTarget(0);
+	m_Document.UpdateTargets();
+	m_Document.CreateAllJoints();
+	m_Document.RemoveUnnecessaryJoints();
+	m_Document.SetTargetScale(2.0);
+	m_Document.SetTargetRootIndex(5);
+	m_Document.SaveTargetSubjectURL(QUrl::fromLocalFile(QString::fromStdString((m_Folder / "a.qrr").string())));
+	EXPECT_TRUE(boost::filesystem::is_empty(m_Folder));
+	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0x8000000Au);
+	EXPECT_EQ(m_Changes, 0);
+	EXPECT_EQ(log.Take(), "");
+	EXPECT_FALSE(m_Document.GetCurrentFrame());
+	EXPECT_FALSE(m_Document.GetFBXSkeleton());
+	EXPECT_EQ(m_Document.GetTargetScale(), 1.0);
+	CoreOrlexTypes::VSubject subject;
+	VSubjectParametrised parametrised;
+	VSubjectApplicationData data;
+	EXPECT_FALSE(m_Document.GetSourceTemplate(subject) || m_Document.GetTargetTemplate(subject)
+	    || m_Document.GetSourceSubject(parametrised) || m_Document.GetTargetSubject(parametrised)
+	    || m_Document.GetTargetSubjectAndData(parametrised, data));
+}
+
+TEST_F(Document, TheFrameHoldsTheSixItems)
+{
+	SetSmallSubjects();
+	const auto pFrame = m_Document.GetCurrentFrame();
+	ASSERT_TRUE(pFrame);
+	const auto& rItems = dynamic_cast<InMemoryHost::VFlowFrame&>(*pFrame).Items();
+	std::string types;
+	for (const auto& pItem : rItems)
+		types += pItem->FlowType() + " ";
+	EXPECT_EQ(types,
+	    "FlowSubject FlowSubjectApplicationData FlowSubjectParametrised FlowSubjectForSolving "
+	    "FlowSubjectApplicationDataForSolving FlowSubjectParametrisedForSolving ");
+	EXPECT_EQ(TesselPluginInterface::ItemValue<VSubjectParametrised>(rItems[2])->m_Segments[1].m_Name, "LeftArm");
+	EXPECT_EQ(m_Document.GetSourceSegmentModel()->rowCount(), 5);
+	EXPECT_EQ(m_Document.GetTargetSegmentModel()->rowCount(), 5);
+}
+
+TEST_F(Document, AnEditMakesNewItemsAndLeavesTheOldOnes)
+{
+	SetSmallSubjects();
+	const auto before = m_Document.TargetValues();
+	const auto pFrame = m_Document.GetCurrentFrame();
+	const auto pModel = m_Document.GetTargetModel();
+	m_Document.AddTarget(1, 1, true, true);
+	EXPECT_EQ(m_Changes, 1);
+	EXPECT_EQ(before.m_pParametrised->m_Targets.size(), 0u);
+	EXPECT_NE(m_Document.GetCurrentFrame(), pFrame);
+	EXPECT_EQ(pModel->rowCount(), 2);
+	CoreOrlexTypes::VSubject subject;
+	ASSERT_TRUE(m_Document.GetTargetTemplate(subject));
+	EXPECT_EQ(subject.m_Targets.size(), 2u);
+}
+
+TEST_F(Document, AddTargetRows)
+{
+	const struct
+	{
+		const char* m_pName;
+		int m_Source;
+		int m_Target;
+		bool m_bSymmetry;
+		std::string m_Targets;
+		const char* m_pTold;
+	} rows[] = {
+	    {"one side", 1, 1, false, "LeftArm>arm_l ", ""},
+	    {"both sides", 4, 4, true, "RightHand>hand_r LeftHand>hand_l ", ""},
+	    {"no partner on either side", 0, 0, true, "Hips>pelvis ",
+	        "3 RetargetSetup: Segment 'Hips' of the source subject has no partner on the other side: no mirrored "
+	        "target is "
+	        "added\n3 RetargetSetup: Segment 'pelvis' of the target subject has no partner on the other side: no "
+	        "mirrored "
+	        "target is added"},
+	    {"no partner on one side", 1, 0, true, "LeftArm>pelvis ",
+	        "3 RetargetSetup: Segment 'pelvis' of the target subject has no partner on the other side: no mirrored "
+	        "target "
+	        "is added"},
+	    {"minus one", -1, 1, false, "", ""},
+	    {"beyond the source", 5, 1, false, "", ""},
+	    {"minus one for the target", 1, -1, true, "", ""},
+	    {"beyond the target", 1, 5, true, "", ""},
+	};
+	for (const auto& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		SetSmallSubjects();
+		VLogRecorder log;
+		m_Document.AddTarget(rRow.m_Source, rRow.m_Target, true, rRow.m_bSymmetry);
+		std::string names;
+		for (const auto& rTarget : m_Document.TargetValues().m_pApplicationData->m_Targets)
+			names += rTarget.m_Name + " ";
+		EXPECT_EQ(names, rRow.m_Targets);
+		EXPECT_EQ(m_Changes, rRow.m_Targets.empty() ? 0 : 1);
+		EXPECT_EQ(log.Take(), rRow.m_pTold);
+	}
+}
+
+TEST_F(Document, RemoveTargetOutOfRangeChangesNothing)
+{
+	SetSmallSubjects();
+	m_Document.AddTarget(1, 1, true, false);
+	m_Document.RemoveTarget(-1);
+	m_Document.RemoveTarget(1);
+	EXPECT_EQ(m_Changes, 1);
+	m_Document.RemoveTarget(0);
+	EXPECT_TRUE(Target().m_Targets.empty() && Target().m_Markers.empty());
+}
+
+TEST_F(Document, ATargetThatFitsNoClassDoesNotStopTheOthers)
+{
+	SetSmallSubjects();
+	VSubjectParametrised subject = Target();
+	subject.m_Targets.resize(1);
+	subject.m_Targets[0].m_Type = VSubjectParametrised::VTarget::ERigidBody;
+	VSubjectApplicationData data = *m_Document.TargetValues().m_pApplicationData;
+	data.m_Targets.resize(1);
+	m_Document.SetTargetSubject(subject, data);
+	m_Document.AddTarget(1, 1, true, false);
+	EXPECT_EQ(Target().m_Targets.size(), 2u);
+}
+
+TEST_F(Document, ABrokenTreeIsToldAndLeftAlone)
+{
+	SetSmallSubjects();
+	VSubjectParametrised subject = Target();
+	subject.m_Segments[1].m_ParentSegmentIndex = 3;
+	m_Document.SetTargetSubjectParametrised(subject);
+	VLogRecorder log;
+	m_Document.AddTarget(1, 1, true, false);
+	m_Document.UpdateTargets();
+	EXPECT_EQ(Target(), subject);
+	EXPECT_EQ(log.Take(),
+	    "3 RetargetSetup: The segments of the target subject make no tree with joints, so their poses are "
+	    "not known\n3 RetargetSetup: The segments of the target subject make no tree with joints, so "
+	    "their poses are not known");
+}
+
+TEST_F(Document, OffsetsFollowThePoseOnlyWhenUpdated)
+{
+	SetSmallSubjects();
+	m_Document.AddTarget(1, 1, true, false);
+	const auto offset = [this] { return Target().m_Targets.at(0).m_StateExpressions; };
+	const std::vector<std::string> first = {"150.000000*GlobalScale", "0.000000*GlobalScale", "200.000000*GlobalScale"};
+	EXPECT_EQ(offset(), first);
+	VSubjectParametrised subject = Target();
+	subject.m_Segments[0].m_Joint.m_BindPose = {0, 0, std::numbers::pi / 2, 0, 0, 100};
+	m_Document.SetTargetSubjectParametrised(subject);
+	EXPECT_EQ(offset(), first);
+	m_Document.UpdateTargets();
+	// The arm stands at (0, 150, 300) with X along world Y; the source's at (300, 0, 400).
+	EXPECT_EQ(offset(),
+	    (std::vector<std::string>{"-150.000000*GlobalScale", "-300.000000*GlobalScale", "100.000000*GlobalScale"}));
+}
+
+TEST_F(Document, TheScale)
+{
+	m_Document.SetTargetScale(0.5);
+	EXPECT_EQ(m_Document.GetTargetScale(), 1.0) << "there is no target subject yet";
+	SetSmallSubjects();
+	VSubjectParametrised subject = Target();
+	subject.m_DynamicParameters.push_back({"Age", 0, 0, 40, false});
+	subject.m_DynamicParameters.push_back({"GlobalScale", 0, 0, 9, false});
+	m_Document.SetTargetSubjectParametrised(subject);
+	EXPECT_EQ(m_Document.GetTargetScale(), 1.0) << "the first of that name";
+	const auto pData = m_Document.TargetValues().m_pApplicationData;
+	VLogRecorder log;
+	m_Document.SetTargetScale(2.0);
+	EXPECT_EQ(log.Take(), "3 RetargetSetup: The new scale drops the dynamic parameters 'Age', 'GlobalScale'");
+	ASSERT_EQ(Target().m_DynamicParameters.size(), 1u);
+	EXPECT_EQ(Target().m_DynamicParameters[0].m_Prior, 2.0);
+	EXPECT_EQ(m_Document.GetTargetScale(), 2.0);
+	EXPECT_EQ(m_Document.TargetValues().m_pSubject->m_Segments[1].m_PreTranslation[0], 300.0);
+	EXPECT_EQ(m_Document.TargetValues().m_pApplicationData, pData);
+
+	m_Changes = 0;
+	for (const double scale :
+	    {0.0, -1.0, std::numeric_limits<double>::infinity(), std::numeric_limits<double>::quiet_NaN()})
+	{
+		m_Document.SetTargetScale(scale);
+		EXPECT_EQ(m_Document.GetTargetScale(), 2.0);
+		EXPECT_EQ(log.Take().find("3 RetargetSetup: A scale must be a finite number above 0, not "), 0u);
+	}
+	EXPECT_EQ(m_Changes, 0);
+}
+
+TEST_F(Document, PruningTellsHowFarThePoseWent)
+{
+	SetSmallSubjects();
+	m_Document.AddTarget(3, 3, true, false);
+	VSubjectParametrised subject = Target();
+	subject.m_Segments[1].m_PreRotation[0] = "1.5707963267948966";
+	m_Document.SetTargetSubjectParametrised(subject);
+	VLogRecorder log;
+	m_Document.RemoveUnnecessaryJoints();
+	EXPECT_EQ(log.Take(), "") << "at rest nothing moves";
+
+	SetSmallSubjects();
+	subject.m_Segments[1].m_Joint.m_BindPose = {0, 0, 0.5};
+	m_Document.SetTargetSubjectParametrised(subject);
+	m_Document.RemoveUnnecessaryJoints();
+	EXPECT_EQ(Target().m_Segments[1].m_Joint.m_JointType, VJoint::EDummy);
+	EXPECT_EQ(Target().m_Segments[3].m_Joint.m_JointType, VJoint::EBall);
+	// The hand hangs 125 mm along X: once in the XZ plane, once in the XY plane, half a radian away from X.
+	const std::string told = log.Take();
+	EXPECT_EQ(
+	    told.find("3 RetargetSetup: Removing joints changed the bind pose: segment 'hand_l' most, by 84.8 mm and "), 0u)
+	    << told;
+	m_Document.CreateAllJoints();
+	EXPECT_EQ(Target().m_Segments[1].m_Joint.m_JointType, VJoint::EBall);
+}
+
+TEST_F(Document, CallbacksThroughADispatcherReadWhatStandsWhenTheyRun)
+{
+	SetSmallSubjects();
+	std::string names;
+	m_Document.GetChangedSignal().Connect([&]
+	    { names += m_Document.GetSourceName() + std::to_string(Target().m_Targets.size()) + ";"; },
+	    m_Host.GetDispatcher());
+	m_Document.AddTarget(1, 1, true, false);
+	m_Document.AddTarget(1, 1, true, false);
+	EXPECT_EQ(names, "");
+	m_Host.Dispatcher().RunPending();
+	EXPECT_EQ(names, "2;2;");
+}
+
+TEST_F(Document, AManyStepDragKeepsOneFrameAlive)
+{
+	SetSmallSubjects();
+	m_Document.AddTarget(1, 1, true, true);
+	std::weak_ptr<const VSubjectParametrised> pFirst = m_Document.TargetValues().m_pParametrised;
+	for (int step = 0; step < 200; ++step)
+	{
+		VSubjectParametrised subject = Target();
+		subject.m_Segments[1].m_Joint.m_BindPose = {0.01 * step, 0, 0};
+		m_Document.SetTargetSubjectParametrised(std::move(subject));
+	}
+	EXPECT_TRUE(pFirst.expired()) << "nothing may keep the subjects of earlier steps";
+	EXPECT_EQ(m_Document.TargetValues().m_pParametrised.use_count(), 4)
+	    << "one item, the two models, and the value in hand";
+	EXPECT_EQ(Target().m_Segments[1].m_Joint.m_BindPose[0], 1.99);
+}
+
+} // namespace

@@ -1,0 +1,361 @@
+// The document from end to end on files: an FBX file and a performer in, a retarget subject out and in again.
+
+#include "TestDocument.h"
+
+#include "CoreOrlexTypes/SubjectRecord.h"
+#include "CoreOrlexTypes/TextForm.h"
+#include "RetargetSetupDocument/FilePath.h"
+
+#include <boost/filesystem/fstream.hpp>
+
+#include <algorithm>
+#include <sstream>
+
+namespace
+{
+
+using CoreOrlexTypes::VSubjectApplicationData;
+using CoreOrlexTypes::VSubjectParametrised;
+using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
+
+const boost::filesystem::path c_Demo = RETARGET_SOURCE "/demo";
+const boost::filesystem::path c_Cases = RETARGET_TEST_DATA "/fbx/cases";
+
+int IndexOf(const VSubjectParametrised& i_rSubject, const std::string& i_rName)
+{
+	const auto found = std::find_if(i_rSubject.m_Segments.begin(), i_rSubject.m_Segments.end(),
+	    [&i_rName](const auto& i_rSegment) { return i_rSegment.m_Name == i_rName; });
+	return found == i_rSubject.m_Segments.end() ? -1 : int(found - i_rSubject.m_Segments.begin());
+}
+
+/// Without what a file does not keep: the ids of markers and rotation observations, and the order of the latter.
+VSubjectParametrised AsFilesKeepIt(VSubjectParametrised i_Subject)
+{
+	for (auto& rMarker : i_Subject.m_Markers)
+		rMarker.m_MarkerId = 0;
+	std::vector<std::string> names;
+	for (auto& rRotation : i_Subject.m_Rotations)
+	{
+		rRotation.m_RotationId = 0;
+		names.push_back(rRotation.m_Name);
+	}
+	std::sort(names.begin(), names.end());
+	for (auto& rTarget : i_Subject.m_Targets)
+		for (auto& rIndex : rTarget.m_RotationObservationIndices)
+			rIndex = std::uint32_t(
+			    std::find(names.begin(), names.end(), i_Subject.m_Rotations.at(rIndex).m_Name) - names.begin());
+	for (std::size_t i = 0; i < names.size(); ++i)
+		i_Subject.m_Rotations[i].m_Name = names[i];
+	return i_Subject;
+}
+
+std::string ReadBytes(const boost::filesystem::path& i_rPath)
+{
+	boost::filesystem::ifstream stream(i_rPath, std::ios::binary);
+	return {std::istreambuf_iterator<char>(stream), {}};
+}
+
+class Flow : public VDocumentTest
+{
+protected:
+	void WriteBytes(const boost::filesystem::path& i_rPath, const std::string& i_rBytes)
+	{
+		boost::filesystem::ofstream(i_rPath, std::ios::binary) << i_rBytes;
+	}
+
+	/// The pairs of the demo's mapping file, through the commands that QML calls.
+	void AddDemoTargets()
+	{
+		std::stringstream mapping(ReadBytes(c_Demo / "mapping.txt"));
+		VSubjectParametrised source;
+		ASSERT_TRUE(m_Document.GetSourceSubject(source));
+		bool bSymmetry = false;
+		for (std::string option, pair; mapping >> option;)
+		{
+			if (option == "--symmetry" || option == "--no-symmetry")
+			{
+				bSymmetry = option == "--symmetry";
+				continue;
+			}
+			mapping >> pair;
+			const std::size_t colon = pair.find(':');
+			const int sourceIndex = IndexOf(source, pair.substr(0, colon));
+			const int targetIndex = IndexOf(Target(), pair.substr(colon + 1));
+			ASSERT_TRUE(sourceIndex >= 0 && targetIndex >= 0) << pair;
+			QMetaObject::invokeMethod(&m_Document, "AddTarget", Q_ARG(int, sourceIndex), Q_ARG(int, targetIndex),
+			    Q_ARG(bool, option == "--position"), Q_ARG(bool, bSymmetry));
+		}
+	}
+};
+
+TEST_F(Flow, FromFBXToASavedSubjectAndBack)
+{
+	ASSERT_TRUE(m_Document.LoadSourceSubject(c_Demo / "performer.qrs", "Actor"));
+	EXPECT_EQ(m_Document.GetSourceName(), "performer");
+	EXPECT_EQ(m_Document.SourceValues().m_pApplicationData->m_Skin, "Actor");
+	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Demo / "character.fbx"));
+	EXPECT_TRUE(m_Document.IsTargetFBXComplete());
+	EXPECT_FALSE(m_Document.TargetValues().m_pParametrised) << "nothing is made before it is asked for";
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(Target().m_Segments.size(), 39u);
+	EXPECT_EQ(Target().m_SubjectId, 0x0FFFFFFFu);
+
+	AddDemoTargets();
+	EXPECT_EQ(Target().m_Targets.size(), 34u);
+	m_Document.RemoveUnnecessaryJoints();
+	m_Document.UpdateTargets();
+	const VSubjectParametrised pruned = Target();
+	const auto jointCount = std::count_if(pruned.m_Segments.begin(), pruned.m_Segments.end(),
+	    [](const auto& i_rSegment) { return i_rSegment.m_Joint.m_JointType != VJoint::EDummy; });
+	EXPECT_GT(jointCount, 10);
+	EXPECT_LT(jointCount, 39);
+
+	const boost::filesystem::path file = m_Folder / "Kästrel.v1.qrr";
+	const QUrl url = QUrl::fromLocalFile(QString::fromStdString(file.string()));
+	m_Document.SaveTargetSubjectURL(url);
+	const std::string bytes = ReadBytes(file);
+	ASSERT_FALSE(bytes.empty());
+
+	VRetargetSetup other(m_Host.GetDispatcher(), m_Host.GetFrameFactory(), m_Host.GetItemFactory());
+	other.LoadTargetSubjectURL(url);
+	EXPECT_EQ(other.GetSourceName(), "performer");
+	VSubjectParametrised subject;
+	VSubjectApplicationData data;
+	ASSERT_TRUE(other.GetTargetSubjectAndData(subject, data));
+	EXPECT_EQ(data.m_Skin, "character");
+	EXPECT_EQ(AsFilesKeepIt(subject), AsFilesKeepIt(Target()));
+	EXPECT_EQ(data, *m_Document.TargetValues().m_pApplicationData);
+
+	ASSERT_EQ(other.SaveTargetSubject(m_Folder / "again.qrr"), 0u);
+	EXPECT_EQ(ReadBytes(m_Folder / "again.qrr"), bytes);
+	// Edits go on where the file left off.
+	ASSERT_TRUE(other.LoadSourceSubject(c_Demo / "performer.qrs", ""));
+	other.UpdateTargets();
+	ASSERT_TRUE(other.GetTargetSubject(subject));
+	EXPECT_EQ(AsFilesKeepIt(subject), AsFilesKeepIt(Target()));
+}
+
+TEST_F(Flow, TheRootTakesItsPlaceInAWorldWithZUp)
+{
+	const struct
+	{
+		const char* m_pFile;
+		/// In the file's space.
+		QVector3D m_Up;
+	} rows[] = {{"inch_x_up.fbx", {1, 0, 0}}, {"millimetre_y_up.fbx", {0, 1, 0}}, {"metre_z_up.fbx", {0, 0, 1}}};
+	for (const auto& rRow : rows)
+	{
+		ASSERT_TRUE(m_Document.LoadTargetFBX(c_Cases / rRow.m_pFile));
+		const QVector3D up = m_Document.GetTargetAxisMatrix().mapVector(rRow.m_Up);
+		EXPECT_NEAR((up - QVector3D(0, 0, 1)).length(), 0, 1e-6) << rRow.m_pFile;
+		m_Document.CreateTargetSubject();
+		const std::vector<double> pose = Target().m_Segments[0].m_Joint.m_BindPose;
+		ASSERT_EQ(pose.size(), 6u);
+		const QMatrix4x4 world = m_Document.GetTargetAxisMatrix() * (*m_Document.GetFBXSkeleton())[0].m_Global;
+		for (int row = 0; row < 3; ++row)
+			EXPECT_EQ(pose[std::size_t(3 + row)], double(world(row, 3)));
+		EXPECT_EQ(Target().m_Segments[0].m_Joint.m_Mean, pose);
+	}
+}
+
+TEST_F(Flow, ALaterRootDropsWhatStandsBefore)
+{
+	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Cases / "metre_z_up.fbx"));
+	m_Document.SetTargetScale(2.0);
+	m_Document.SetTargetRootIndex(1);
+	m_Document.CreateTargetSubject();
+	ASSERT_EQ(Target().m_Segments.size(), 2u);
+	EXPECT_EQ(Target().m_Segments[0].m_Name, "middle");
+	EXPECT_EQ(m_Document.GetTargetScale(), 2.0);
+	const QMatrix4x4& rGlobal = (*m_Document.GetFBXSkeleton())[1].m_Global;
+	EXPECT_EQ(Target().m_Segments[0].m_Joint.m_BindPose[3], double(rGlobal(0, 3))) << "the place carries no scale";
+
+	VLogRecorder log;
+	m_Document.SetTargetRootIndex(3);
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(Target().m_Segments.size(), 2u) << "the old subject stays";
+	EXPECT_EQ(log.Take(), "3 RetargetSetup: The FBX skeleton has no bone 3 to begin with: nothing is made");
+}
+
+TEST_F(Flow, SeveralRootsAreTold)
+{
+	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Cases / "skeleton_kinds.fbx"));
+	VLogRecorder log;
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(Target().m_Segments.size(), 4u);
+	EXPECT_NE(
+	    log.Take().find("3 RetargetSetup: The file has 2 root bones, and no root was chosen: only the first is taken, "
+	                    "of 'master', 'secondRoot'"),
+	    std::string::npos);
+	m_Document.SetTargetRootIndex(4);
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(log.Take().find("root bones"), std::string::npos);
+	EXPECT_EQ(Target().m_Segments.size(), 2u);
+}
+
+TEST_F(Flow, ARootWithAPreRotationAndALostRotationAreTold)
+{
+	VLogRecorder log;
+	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Cases / "metre_z_up.fbx"));
+	m_Document.SetTargetRootIndex(1);
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(log.Take(),
+	    "3 RetargetSetup: Root bone 'middle' has a pre-rotation, which counts twice: the bind pose differs "
+	    "from the pose in the file");
+	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Cases / "negative_scale.fbx"));
+	m_Document.SetTargetRootIndex(0);
+	m_Document.CreateTargetSubject();
+	EXPECT_NE(
+	    log.Take().find("3 RetargetSetup: The local transform of bone 'mirror' is no rotation"), std::string::npos);
+	m_Document.SetTargetRootIndex(1);
+	m_Document.CreateTargetSubject();
+	EXPECT_NE(log.Take().find("3 RetargetSetup: The place of root bone 'mirror' is no rotation"), std::string::npos);
+}
+
+TEST_F(Flow, AnFBXFileThatGivesNoSkeleton)
+{
+	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Demo / "character.fbx"));
+	m_Document.CreateTargetSubject();
+	const auto pSkeleton = m_Document.GetFBXSkeleton();
+	const VLogRecorder quiet;
+	EXPECT_FALSE(m_Document.LoadTargetFBX(m_Folder / "missing.fbx"));
+	EXPECT_EQ(m_Document.GetFBXSkeleton(), pSkeleton);
+	EXPECT_FALSE(m_Document.LoadTargetFBX(c_Cases / "no_skeleton.fbx"));
+	EXPECT_FALSE(m_Document.GetFBXSkeleton());
+	EXPECT_EQ(Target().m_Segments.size(), 39u);
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(Target().m_Segments.size(), 39u);
+}
+
+TEST_F(Flow, FilesThatCannotBeReadChangeNothing)
+{
+	SetSmallSubjects();
+	const auto before = m_Document.TargetValues();
+	WriteBytes(m_Folder / "text.qrr", "no subject");
+	WriteBytes(m_Folder / "legacy.QRX", "[[1,0,1],\"\"]{}");
+	WriteBytes(m_Folder / "newer.qrx", "[[1,0,2],\"\"]{}");
+	const std::pair<boost::filesystem::path, std::uint32_t> rows[] = {{m_Folder / "missing.qrr", 0x80000000u},
+	    {m_Folder / "text.qrr", 0x80000000u}, {m_Folder, 0x80000000u}, {m_Folder / "legacy.QRX", 0x80000000u},
+	    {m_Folder / "missing.qrx", 0x8000002Au}, {m_Folder / "newer.qrx", 0x80000018u}};
+	const VLogRecorder quiet;
+	for (const auto& [path, status] : rows)
+		EXPECT_EQ(m_Document.LoadTargetSubject(path), status) << path;
+	EXPECT_FALSE(m_Document.LoadSourceSubject(m_Folder / "text.qrr", ""));
+	m_Document.LoadTargetSubjectURL(QUrl("http://example.com/a.qrr"));
+	m_Document.LoadTargetSubjectURL(QUrl());
+	EXPECT_EQ(m_Document.TargetValues().m_pParametrised, before.m_pParametrised);
+	EXPECT_EQ(m_Document.GetSourceName(), "");
+	EXPECT_EQ(m_Changes, 0);
+}
+
+TEST_F(Flow, ALegacyFileBecomesASubjectOfToday)
+{
+	CoreOrlexTypes::VSubjectRecord record;
+	record.m_SubjectParametrised = MakeSubject({{"pelvis", -1}, {"arm", 0}});
+	for (auto& rSegment : record.m_SubjectParametrised.m_Segments)
+	{
+		rSegment.m_Joint.m_TPoseMean = rSegment.m_Joint.m_BindPose;
+		rSegment.m_Joint.m_TPoseMean[0] = 0.25;
+		rSegment.m_Joint.m_BindPose.clear();
+	}
+	record.m_SubjectApplicationData.m_RetargetSourceTemplate = "Anna";
+	std::string text = "{\"Version\":[1,0,1],\"Schema\":\"any\"}\n";
+	ASSERT_TRUE(CoreOrlexTypes::WriteText(record, text, CoreOrlexTypes::ETextSpelling::EPositional));
+	WriteBytes(m_Folder / "old.qrx", text);
+
+	std::string names;
+	const auto note = [&] { names += "'" + m_Document.GetSourceName() + "'"; };
+	m_Document.GetChangedSignal().Connect(note);
+	m_Document.GetChangedSignal().Connect(note, m_Host.GetDispatcher());
+	VLogRecorder log;
+	EXPECT_EQ(m_Document.LoadTargetSubject(m_Folder / "old.qrx"), 0u);
+	EXPECT_EQ(log.Take(),
+	    "3 RetargetSetup: Legacy file: the id 0 of the application data becomes 268435455\n"
+	    "3 RetargetSetup: Legacy file: the application data of 0 segments is brought to the subject's 2");
+	m_Host.Dispatcher().RunPending();
+	EXPECT_EQ(names, "'''Anna'") << "published first; a queued callback sees the new name";
+	EXPECT_EQ(Target().m_Segments[1].m_Joint.m_BindPose, (std::vector<double>{0.25, 0, 0}));
+	EXPECT_TRUE(Target().m_Segments[1].m_Joint.m_TPoseMean.empty());
+	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "new.qrr"), 0u);
+	EXPECT_EQ(m_Document.LoadTargetSubject(m_Folder / "new.qrr"), 0u);
+	EXPECT_EQ(m_Document.GetSourceName(), "Anna");
+}
+
+TEST_F(Flow, ABindPoseOfTheFirstSegmentCountsForAll)
+{
+	for (const bool bFirst : {true, false})
+	{
+		VSubjectParametrised subject = MakeSubject({{"pelvis", -1}, {"arm", 0}});
+		subject.m_Segments[0].m_Joint.m_TPoseMean = {1, 0, 0, 0, 0, 0};
+		subject.m_Segments[1].m_Joint.m_TPoseMean = {1, 0, 0};
+		subject.m_Segments[bFirst ? 1 : 0].m_Joint.m_BindPose.clear();
+		VSubjectApplicationData data;
+		data.m_Segments.resize(2);
+		m_Document.SetTargetSubject(subject, data);
+		ASSERT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0u);
+		ASSERT_EQ(m_Document.LoadTargetSubject(m_Folder / "a.qrr"), 0u);
+		EXPECT_EQ(Target().m_Segments[0].m_Joint.m_BindPose[0], bFirst ? 0.0 : 1.0);
+		EXPECT_EQ(Target().m_Segments[1].m_Joint.m_BindPose.size(), bFirst ? 0u : 3u);
+		EXPECT_EQ(Target().m_Segments[1].m_Joint.m_TPoseMean.size(), bFirst ? 3u : 0u);
+	}
+}
+
+TEST_F(Flow, ASourceWithoutABindPoseStandsOnTheFloor)
+{
+	VSubjectParametrised subject = MakeSubject({{"Hips", -1}, {"Head", 0, {"0", "500", "0"}}});
+	for (auto& rSegment : subject.m_Segments)
+		rSegment.m_Joint.m_BindPose.clear();
+	VSubjectApplicationData data;
+	data.m_Segments.resize(2);
+	m_Document.SetTargetSubject(subject, data);
+	ASSERT_EQ(m_Document.SaveTargetSubject(m_Folder / "Anna.take2.qrs"), 0u);
+	ASSERT_TRUE(m_Document.LoadSourceSubject(m_Folder / "Anna.take2.qrs", ""));
+	EXPECT_EQ(m_Document.GetSourceName(), "Anna.take2");
+	EXPECT_EQ(m_Document.SourceValues().m_pParametrised->m_Segments[0].m_Joint.m_BindPose,
+	    (std::vector<double>{1.5707963267948966, 0, 0, 0, 0, 1000}));
+	EXPECT_EQ(m_Document.SourceValues().m_pParametrised->m_Segments[1].m_Joint.m_BindPose, std::vector<double>(3));
+}
+
+TEST_F(Flow, AFailedSaveLeavesTheFile)
+{
+	SetSmallSubjects();
+	ASSERT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0u);
+	const std::string bytes = ReadBytes(m_Folder / "a.qrr");
+	VSubjectParametrised subject = Target();
+	subject.m_Segments[0].m_Joint.m_Mean[0] = std::numeric_limits<double>::infinity();
+	m_Document.SetTargetSubjectParametrised(subject);
+	VLogRecorder log;
+	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0x80000020u);
+	EXPECT_NE(log.Take().find("Could not stringify"), std::string::npos);
+	EXPECT_EQ(ReadBytes(m_Folder / "a.qrr"), bytes);
+	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "missing" / "a.qrr"), 0x80000020u);
+	EXPECT_EQ(std::distance(boost::filesystem::directory_iterator(m_Folder), {}), 1) << "nothing is left behind";
+}
+
+TEST_F(Flow, NamesUsedTwiceAreToldAtSave)
+{
+	m_Document.SetTargetSubject(MakeSubject({{"a", -1}, {"b", 0}, {"b", 0}, {"b", 1}}), {});
+	VLogRecorder log;
+	m_Document.SaveTargetSubject(m_Folder / "a.qrr");
+	EXPECT_NE(
+	    log.Take().find("3 RetargetSetup: 3 segments are named 'b': when the file is read, all their targets come "
+	                    "back on the first"),
+	    std::string::npos);
+}
+
+TEST(FilePath, Rows)
+{
+	const struct
+	{
+		const char* m_pPath;
+		const char* m_pStem;
+		const char* m_pExtension;
+	} rows[] = {{"/a.b/c.d.fbx", "c.d", ".fbx"}, {"/a.b/c", "c", ""}, {".qrx", "", ".qrx"}, {"x.", "x", "."}};
+	for (const auto& rRow : rows)
+	{
+		EXPECT_EQ(RetargetSetup::FileStem(rRow.m_pPath), rRow.m_pStem);
+		EXPECT_EQ(RetargetSetup::FileExtension(rRow.m_pPath), rRow.m_pExtension);
+	}
+}
+
+} // namespace

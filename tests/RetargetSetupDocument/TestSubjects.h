@@ -1,0 +1,81 @@
+#pragma once
+
+#include "CoreOrlexTypes/JointType.h"
+#include "CoreOrlexTypes/SubjectParametrised.h"
+#include "DebugServices/GlobalLog.h"
+#include "FBXIO/SkinSkeleton.h"
+#include "RetargetSetupDocument/GlobalScale.h"
+#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/Joints.h"
+
+#include <initializer_list>
+#include <memory>
+#include <string>
+#include <vector>
+
+/// What the log receives while this lives, one line for each message, as "3 RetargetSetup: text".
+class VLogRecorder
+{
+public:
+	VLogRecorder()
+	    : m_pToken(NVX::GlobalLog::AddSink(
+	        [this](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)
+	        { m_Lines.push_back(std::to_string(i_Level) + " " + i_rCategory.Name() + ": " + i_rMessage); }))
+	{
+	}
+
+	/// The lines so far, which are then forgotten.
+	std::string Take()
+	{
+		std::string text;
+		for (const std::string& rLine : m_Lines)
+			text += (text.empty() ? "" : "\n") + rLine;
+		m_Lines.clear();
+		return text;
+	}
+
+private:
+	std::vector<std::string> m_Lines;
+	std::shared_ptr<void> m_pToken;
+};
+
+struct VTestSegment
+{
+	const char* m_pName;
+	int m_Parent;
+	std::array<const char*, 3> m_PreTranslation{"0", "0", "0"};
+};
+
+/// Free root, Ball joints below, all at rest; with the document's identity and a scale of 1.
+inline CoreOrlexTypes::VSubjectParametrised MakeSubject(std::initializer_list<VTestSegment> i_Segments)
+{
+	CoreOrlexTypes::VSubjectParametrised subject;
+	subject.m_Name = RetargetSetup::c_SubjectName;
+	subject.m_SubjectId = RetargetSetup::c_SubjectId;
+	RetargetSetup::SetGlobalScale(subject, 1.0);
+	for (const VTestSegment& rTest : i_Segments)
+	{
+		auto& rSegment = subject.m_Segments.emplace_back();
+		rSegment.m_Name = rTest.m_pName;
+		rSegment.m_SegmentIndex = std::uint32_t(subject.m_Segments.size() - 1);
+		if (rTest.m_Parent >= 0)
+		{
+			rSegment.m_ParentSegmentIndex = std::uint32_t(rTest.m_Parent);
+			rSegment.m_TreeDepth = subject.m_Segments[std::size_t(rTest.m_Parent)].m_TreeDepth + 1;
+		}
+		for (std::size_t i = 0; i < 3; ++i)
+			rSegment.m_PreTranslation[i] = rTest.m_PreTranslation[i];
+		RetargetSetup::EnableJoint(subject, subject.m_Segments.size() - 1, {});
+	}
+	return subject;
+}
+
+inline FBXIO::VSkinBone MakeBone(
+    const char* i_pName, std::int64_t i_Parent, float i_X = 0, float i_Y = 0, float i_Z = 0)
+{
+	FBXIO::VSkinBone bone;
+	bone.m_Name = i_pName;
+	bone.m_ParentIndex = i_Parent;
+	bone.m_Local.translate(i_X, i_Y, i_Z);
+	return bone;
+}
