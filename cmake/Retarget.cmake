@@ -9,6 +9,10 @@ set(CMAKE_CXX_EXTENSIONS OFF)
 set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
 # One form of code for the libraries, the module that is made of them, and the programs.
 add_compile_options(-fPIC -Wall -Wextra -Werror)
+if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_LESS 13)
+	# False alarms about string concatenation at -O3.
+	add_compile_options(-Wno-restrict)
+endif()
 
 if(RETARGET_SANITIZE)
 	add_compile_options(-fsanitize=${RETARGET_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
