@@ -29,12 +29,11 @@ std::string_view TakePart(std::string_view& io_rText)
 	return {pBegin, pStop};
 }
 
-std::size_t CountParts(std::string_view i_Text)
+/// The text of an attribute while it is converted; kept between calls for its memory.
+std::string& Scratch()
 {
-	std::size_t count = 0;
-	while (!TakePart(i_Text).empty())
-		++count;
-	return count;
+	thread_local std::string s_Text;
+	return s_Text;
 }
 
 template <typename T>
@@ -55,45 +54,73 @@ bool ToInteger(std::string_view i_Text, T& o_rValue)
 template <typename T>
 bool ReadSingle(INode& io_rNode, const VAttribute& i_rAttribute, T& o_rValue)
 {
-	std::string text;
-	if (!ReadAttribute(io_rNode, i_rAttribute, text))
+	std::string& rText = Scratch();
+	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
 		return false;
-	if (ToValue(text, o_rValue))
+	if (ToValue(rText, o_rValue))
 		return true;
 	AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
 	return false;
 }
 
-/// @param i_rConvert called with each part and its index; false if the part does not convert.
-template <typename TConvert>
-bool ReadParts(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, const TConvert& i_rConvert)
+/// Takes the next real off the text's front, behind white space. The text is not cut first: lists of numbers are most
+/// of a file.
+bool TakeValue(std::string_view& io_rText, double& o_rValue)
 {
-	std::string text;
-	if (!ReadAttribute(io_rNode, i_rAttribute, text))
+	const std::size_t read = NumberText::ScanReal(io_rText, o_rValue);
+	if (read == 0 || (read < io_rText.size() && !IsSpace(io_rText[read])) || !std::isfinite(o_rValue))
 		return false;
-	if (CountParts(text) != i_Count)
-	{
-		AddIncorrectCount(io_rNode, i_rAttribute.m_Name);
-		return false;
-	}
-	std::string_view rest = text;
-	for (std::size_t i = 0; i < i_Count; ++i)
-		if (!i_rConvert(TakePart(rest), i))
-		{
-			AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
-			return false;
-		}
+	io_rText.remove_prefix(read);
 	return true;
 }
 
+bool TakeValue(std::string_view& io_rText, std::int32_t& o_rValue)
+{
+	std::string_view rest = io_rText;
+	if (!ToValue(TakePart(rest), o_rValue))
+		return false;
+	io_rText = rest;
+	return true;
+}
+
+/// @param i_rTake takes a value off the text's front, or returns false without taking anything.
+template <typename T, typename TTake>
+bool ReadValues(
+    INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, T* o_pValues, const TTake& i_rTake)
+{
+	std::string& rText = Scratch();
+	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
+		return false;
+	std::string_view rest = rText;
+	bool bAllTaken = true;
+	std::size_t count = 0;
+	while (std::find_if_not(rest.begin(), rest.end(), IsSpace) != rest.end())
+	{
+		if (count < i_Count && i_rTake(rest, count, o_pValues[count]))
+			++count;
+		else
+		{
+			TakePart(rest);
+			bAllTaken = false;
+			++count;
+		}
+	}
+	if (count == i_Count && bAllTaken)
+		return true;
+	if (count != i_Count)
+		AddIncorrectCount(io_rNode, i_rAttribute.m_Name);
+	else
+		AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
+	return false;
+}
+
 /// Values are gathered before the target is touched.
-template <typename T, typename TConvert>
+template <typename T, typename TTake>
 bool ReadInto(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, std::vector<T>& io_rTarget,
-    std::size_t i_Offset, const TConvert& i_rConvert)
+    std::size_t i_Offset, const TTake& i_rTake)
 {
 	std::vector<T> values(i_Count);
-	if (!ReadParts(io_rNode, i_rAttribute, i_Count,
-	        [&](std::string_view i_Part, std::size_t i_Index) { return i_rConvert(i_Part, i_Index, values[i_Index]); }))
+	if (!ReadValues(io_rNode, i_rAttribute, i_Count, values.data(), i_rTake))
 		return false;
 	if (i_Offset == 0 && io_rTarget.size() <= i_Count)
 	{
@@ -212,14 +239,14 @@ bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Cou
     std::size_t i_Offset)
 {
 	return ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset,
-	    [](std::string_view i_Part, std::size_t, double& o_rValue) { return ToValue(i_Part, o_rValue); });
+	    [](std::string_view& io_rText, std::size_t, double& o_rValue) { return TakeValue(io_rText, o_rValue); });
 }
 
 bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count,
     std::vector<std::int32_t>& io_rTarget, std::size_t i_Offset)
 {
 	return ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset,
-	    [](std::string_view i_Part, std::size_t, std::int32_t& o_rValue) { return ToValue(i_Part, o_rValue); });
+	    [](std::string_view& io_rText, std::size_t, std::int32_t& o_rValue) { return TakeValue(io_rText, o_rValue); });
 }
 
 bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, double* o_pTarget)
@@ -235,15 +262,18 @@ bool ReadListWithPlaceholders(INode& io_rNode, const VAttribute& i_rAttribute, s
     std::vector<double>& io_rTarget, std::vector<bool>& o_rPlaceholders, std::size_t i_Offset)
 {
 	std::vector<bool> placeholders(i_Count);
-	const auto convert = [&](std::string_view i_Part, std::size_t i_Index, double& o_rValue)
+	const auto take = [&](std::string_view& io_rText, std::size_t i_Index, double& o_rValue)
 	{
-		if (i_Part != "*" && i_Part != "?")
-			return ToValue(i_Part, o_rValue);
+		std::string_view rest = io_rText;
+		const std::string_view part = TakePart(rest);
+		if (part != "*" && part != "?")
+			return TakeValue(io_rText, o_rValue);
 		placeholders[i_Index] = true;
 		o_rValue = std::numeric_limits<double>::max();
+		io_rText = rest;
 		return true;
 	};
-	if (!ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset, convert))
+	if (!ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset, take))
 		return false;
 	o_rPlaceholders = std::move(placeholders);
 	return true;

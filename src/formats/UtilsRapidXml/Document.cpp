@@ -1,44 +1,12 @@
 #include "UtilsRapidXml/Document.h"
 
 #include "UtilsRapidXml/Characters.h"
+#include "UtilsRapidXml/Printer.h"
 #include "UtilsRapidXml/TextCheck.h"
 
 #include <rapidxml/rapidxml.hpp>
-#include <rapidxml/rapidxml_print.hpp>
 
 #include <cstring>
-
-namespace
-{
-
-/// The printer writes line ends and tabs as they are. In the nodes of a document that is built they stand as bytes that
-/// no text may have, and become references after printing.
-constexpr std::string_view c_Referred = "\t\n\r";
-constexpr char c_MarkOfFirst = 1;
-
-/// Counts what is printed, so that the text is allocated once.
-struct VCounter
-{
-	VCounter& operator*() { return *this; }
-	VCounter& operator++() { return *this; }
-	VCounter& operator++(int) { return *this; }
-	void operator=(char) { ++m_Count; }
-	std::size_t m_Count = 0;
-};
-
-std::string ExpandMarks(const std::string& i_rText)
-{
-	std::string text;
-	text.reserve(i_rText.size() + i_rText.size() / 8);
-	for (const char byte : i_rText)
-		if (byte >= c_MarkOfFirst && byte < c_MarkOfFirst + char(c_Referred.size()))
-			text += "&#" + std::to_string(int(c_Referred[byte - c_MarkOfFirst])) + ';';
-		else
-			text += byte;
-	return text;
-}
-
-} // namespace
 
 namespace UtilsRapidXml
 {
@@ -65,7 +33,6 @@ struct VDocument::VContent
 
 	char m_Empty[1] = {0};
 	std::string m_Text;
-	bool m_bMarks = false;
 	rapidxml::xml_document<char> m_Document;
 };
 
@@ -123,16 +90,9 @@ bool VDocument::AppendAttribute(VXmlNode* i_pElement, std::string_view i_Name, s
 {
 	if (FindBrokenCharacter(i_Text) != std::string_view::npos)
 		return false;
-	char* const pText = m_pContent->Copy(i_Text);
-	for (std::size_t i = 0; i < i_Text.size(); ++i)
-		if (static_cast<unsigned char>(i_Text[i]) < ' ')
-		{
-			pText[i] = c_MarkOfFirst + char(c_Referred.find(i_Text[i]));
-			m_pContent->m_bMarks = true;
-		}
 	rapidxml::xml_attribute<char>* const pAttribute = m_pContent->m_Document.allocate_attribute();
 	pAttribute->name(m_pContent->Copy(i_Name), i_Name.size());
-	pAttribute->value(pText, i_Text.size());
+	pAttribute->value(m_pContent->Copy(i_Text), i_Text.size());
 	i_pElement->append_attribute(pAttribute);
 	return true;
 }
@@ -144,9 +104,7 @@ void VDocument::SetText(VXmlNode* i_pElement, std::string_view i_Text)
 
 std::string VDocument::Print() const
 {
-	std::string text(rapidxml::print(VCounter(), m_pContent->m_Document).m_Count, '\0');
-	rapidxml::print(text.data(), m_pContent->m_Document);
-	return m_pContent->m_bMarks ? ExpandMarks(text) : text;
+	return UtilsRapidXml::Print(m_pContent->m_Document);
 }
 
 } // namespace UtilsRapidXml

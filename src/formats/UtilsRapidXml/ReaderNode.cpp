@@ -70,6 +70,9 @@ VReaderNode::~VReaderNode()
 void VReaderNode::DeclareElement(std::string_view i_Name, std::string_view, std::uint32_t i_MinimumCount,
     std::uint32_t i_MaximumCount, VVersion i_Minimum, VVersion i_Maximum)
 {
+	// A choice is of six.
+	if (m_Pending.empty())
+		m_Pending.reserve(6);
 	m_Pending.push_back({std::string(i_Name), i_MinimumCount, i_MaximumCount, i_Minimum, i_Maximum});
 }
 
@@ -155,7 +158,11 @@ bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string& o_rText
 	while (pAttribute && UtilsRapidXml::Name(pAttribute) != i_Name)
 		pAttribute = pAttribute->next_attribute();
 	if (pAttribute)
+	{
+		if (m_RecognisedAttributes.empty())
+			m_RecognisedAttributes.reserve(16);
 		m_RecognisedAttributes.push_back(pAttribute->name());
+	}
 
 	if (!InRange(GetVersion(), i_Minimum, i_Maximum))
 	{

@@ -4,6 +4,7 @@
 #include "UtilsRapidXml/Limits.h"
 
 #include <algorithm>
+#include <array>
 #include <charconv>
 #include <cstring>
 #include <string_view>
@@ -33,6 +34,15 @@ bool ContinuesName(char i_Byte)
 {
 	return StartsName(i_Byte) || (i_Byte >= '0' && i_Byte <= '9') || i_Byte == '-' || i_Byte == '.';
 }
+
+/// What a quoted value must be looked at for: its end, the text's end, references, and what becomes a blank.
+constexpr auto c_EndsPlain = []
+{
+	std::array<bool, 256> ends{};
+	for (const unsigned char byte : {'\0', '"', '\'', '&', '\t', '\n', '\r'})
+		ends[byte] = true;
+	return ends;
+}();
 
 class VTextCheck
 {
@@ -89,7 +99,8 @@ private:
 	bool Closing();
 	bool Attribute();
 	bool DuplicateAttribute();
-	bool References(const char* i_pBegin, const char* i_pEnd);
+	bool Text(const char* i_pBegin, const char* i_pEnd);
+	bool Reference(const char* i_pAt);
 
 	std::string& m_rText;
 	char* m_p;
@@ -121,7 +132,7 @@ bool VTextCheck::Run()
 			if (pStray != m_p)
 				return Fail(pStray, "text outside of any element");
 		}
-		else if (!References(pText, m_p))
+		else if (!Text(pText, m_p))
 			return false;
 		if (m_p != m_pEnd && !Markup())
 			return false;
@@ -203,14 +214,25 @@ bool VTextCheck::Attribute()
 		return Fail(m_p, "value of attribute " + std::string(name) + " is not quoted");
 	const char quote = *m_p++;
 	char* const pBegin = m_p;
-	m_p = static_cast<char*>(std::memchr(m_p, quote, m_pEnd - m_p));
-	if (!m_p)
-		return Fail(pBegin, "value of attribute " + std::string(name) + " does not end");
-	if (!References(pBegin, m_p))
-		return false;
-	m_LineEndsReplaced += std::count(pBegin, m_p, '\n');
-	for (char* p = pBegin; p != m_p; ++p)
-		*p = IsSpace(*p) ? ' ' : *p;
+	for (;; ++m_p)
+	{
+		while (!c_EndsPlain[static_cast<unsigned char>(*m_p)])
+			++m_p;
+		if (m_p == m_pEnd)
+			return Fail(pBegin, "value of attribute " + std::string(name) + " does not end");
+		if (*m_p == quote)
+			break;
+		if (*m_p == '&')
+		{
+			if (!Reference(m_p))
+				return false;
+		}
+		else if (IsSpace(*m_p))
+		{
+			m_LineEndsReplaced += *m_p == '\n';
+			*m_p = ' ';
+		}
+	}
 	++m_p;
 	SkipSpace();
 	return true;
@@ -219,6 +241,17 @@ bool VTextCheck::Attribute()
 /// True, with the error set, if two attributes of the element in hand have one name.
 bool VTextCheck::DuplicateAttribute()
 {
+	// Names that differ in length or end nearly always have bits of their own here.
+	std::uint64_t bits = 0;
+	bool bMaybe = false;
+	for (const std::string_view name : m_Attributes)
+	{
+		const std::uint64_t bit = std::uint64_t(1) << ((name.size() * 7 + name.back() * 3 + name.front()) % 64);
+		bMaybe = bMaybe || (bits & bit) != 0;
+		bits |= bit;
+	}
+	if (!bMaybe)
+		return false;
 	std::vector<std::string_view>& rNames = m_Attributes;
 	constexpr std::size_t c_Few = 24;
 	const char* pTwice = nullptr;
@@ -244,23 +277,25 @@ bool VTextCheck::DuplicateAttribute()
 	return pTwice && !Fail(pTwice, "attribute " + std::string(pTwice, length) + " stands twice");
 }
 
-bool VTextCheck::References(const char* i_pBegin, const char* i_pEnd)
+bool VTextCheck::Text(const char* i_pBegin, const char* i_pEnd)
 {
-	const char* p = i_pBegin;
-	while (p != i_pEnd && (p = static_cast<const char*>(std::memchr(p, '&', i_pEnd - p))))
-	{
-		const char* const pAt = p++;
-		if (p == i_pEnd || *p != '#')
-			continue;
-		const bool bHexadecimal = ++p != i_pEnd && *p == 'x';
-		p += bHexadecimal;
-		std::uint32_t code = 0;
-		const auto result = std::from_chars(p, i_pEnd, code, bHexadecimal ? 16 : 10);
-		if (result.ec != std::errc() || result.ptr == i_pEnd || *result.ptr != ';' || !IsXmlCharacter(code))
-			return Fail(pAt, "broken character reference");
-		p = result.ptr;
-	}
+	for (const char* p = i_pBegin; (p = static_cast<const char*>(std::memchr(p, '&', i_pEnd - p))); ++p)
+		if (!Reference(p))
+			return false;
 	return true;
+}
+
+/// @param i_pAt the "&" of what may be a reference.
+bool VTextCheck::Reference(const char* i_pAt)
+{
+	// The text ends with a zero byte.
+	if (i_pAt[1] != '#')
+		return true;
+	const bool bHexadecimal = i_pAt[2] == 'x';
+	std::uint32_t code = 0;
+	const auto result = std::from_chars(i_pAt + 2 + bHexadecimal, m_pEnd, code, bHexadecimal ? 16 : 10);
+	return (result.ec == std::errc() && *result.ptr == ';' && IsXmlCharacter(code))
+	    || Fail(i_pAt, "broken character reference");
 }
 
 std::string VTextCheck::Error() const

@@ -100,6 +100,19 @@ std::size_t NumberText::ScanReal(std::string_view i_Text, double& o_rValue)
 	const char* const pBegin = i_Text.data();
 	const char* const pEnd = pBegin + i_Text.size();
 	const char* p = SkipDigits(pBegin, pEnd, IsSpace);
+	// Nearly every number is plain: digits that neither a mark of another base nor an exponent without digits follows.
+	const char* const pDigits = p != pEnd && *p == '-' ? p + 1 : p;
+	if (pDigits != pEnd && (IsDigit(*pDigits) || *pDigits == '.'))
+	{
+		double value = 0.0;
+		const auto result = std::from_chars(p, pEnd, value);
+		const char next = result.ptr == pEnd ? ' ' : char(*result.ptr | 0x20);
+		if (result.ec == std::errc() && next != 'x' && next != 'e')
+		{
+			o_rValue = value;
+			return result.ptr - pBegin;
+		}
+	}
 	bool bNegative = false;
 	if (p != pEnd && (*p == '+' || *p == '-'))
 		bNegative = *p++ == '-';
