@@ -21,7 +21,7 @@ TEST(RoundTrip, PerformerReadsWithoutAWordAndComesBackEqual)
 	EXPECT_TRUE(again.m_bRead);
 	EXPECT_EQ(again.m_Warnings, c_WrittenFileWarnings);
 	ExpectSame(performer, again);
-	EXPECT_EQ(WriteText(again), first);
+	EXPECT_TRUE(WriteText(again) == first);
 }
 
 } // namespace

@@ -40,7 +40,10 @@ void FormatMarkerTemplate(INode& io_rNode, VMarkerInHand& io_rMarker)
 	if (ReadExpressions(io_rNode, Table::c_Position, position))
 	{
 		if (io_rMarker.m_bPosition)
+		{
 			io_rMarker.m_Extras.m_Position = io_rMarker.m_Target.m_StateExpressions;
+			io_rMarker.m_Extras.m_TemplatePosition.assign(position.begin(), position.end());
+		}
 		io_rMarker.m_Target.m_StateExpressions.assign(position.begin(), position.end());
 	}
 	ReadList(io_rNode, Table::c_Covariance, 9, io_rMarker.m_Target.m_TemplateCovariance);

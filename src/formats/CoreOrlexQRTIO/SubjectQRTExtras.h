@@ -51,8 +51,10 @@ struct VSubjectQRTExtras
 	{
 		std::string m_Name;
 		std::string m_Descriptor;
-		/// The marker's own position in its segment, where its template's stands in the target: 3 expressions, or none.
+		/// The marker's own position in its segment where its template has one too, which then stands in the target:
+		/// 3 expressions each, or none.
 		std::vector<std::string> m_Position;
+		std::vector<std::string> m_TemplatePosition;
 		std::string m_TemplatePlacementCovariance;
 
 		bool operator==(const VMarker&) const = default;

@@ -1,6 +1,5 @@
 #include "CoreOrlexQRTIO/AttributeWriting.h"
 #include "CoreOrlexQRTIO/EnumTables.h"
-#include "CoreOrlexQRTIO/Evaluation.h"
 #include "CoreOrlexQRTIO/FormatTable.h"
 #include "CoreOrlexQRTIO/WriteSections.h"
 
@@ -40,11 +39,9 @@ void WriteMarker(VWriterNode& io_rNode, VWriting& io_rWriting, const VMarker& i_
 		if (const std::string* const pName = NameOfSegment(io_rNode, io_rWriting, i_pTarget->m_SegmentIndices[0]))
 			WriteText(io_rNode, Table::c_Segment, *pName);
 		position = WritableExpressions(io_rWriting, i_pTarget->m_StateExpressions);
-		const std::vector<std::string>& rOwn = i_rExtras.m_Position;
-		const bool bOwn = !rOwn.empty()
-		    && EvaluateVector(io_rWriting.m_rParser, rOwn)
-		        == EvaluateVector(io_rWriting.m_rParser, i_pTarget->m_StateExpressions);
-		WriteExpressions(io_rNode, Table::c_Position, bOwn ? rOwn : position);
+		const bool bAsRead =
+		    !i_rExtras.m_Position.empty() && i_rExtras.m_TemplatePosition == i_pTarget->m_StateExpressions;
+		WriteExpressions(io_rNode, Table::c_Position, bAsRead ? i_rExtras.m_Position : position);
 		WriteReals(io_rNode, Table::c_Covariance, i_pTarget->m_Covariance);
 	}
 	WriteReal(io_rNode, Table::c_Radius, i_rMarker.m_Radius);

@@ -183,6 +183,9 @@ void WriteTargetSet(VWriterNode& io_rNode, VWriting& io_rWriting)
 				    AddTargetError(io_rSection, rApplicationData.m_Name, "has a type that a file cannot hold.");
 				    continue;
 			    }
+			    // Before its observation could be told, such a target would come back without one.
+			    if (pKind->HasObservation() && !IsInVersion(io_rSection, *pKind->m_pObservation))
+				    continue;
 			    const VSubjectQRTExtras::VTarget* const pExtras = extras.Find(i, rApplicationData.m_Name);
 			    WriteElement(io_rSection, pKind->m_rElement,
 			        [&](VWriterNode& io_rTarget)

@@ -1,0 +1,240 @@
+#include "Content.h"
+
+#include "CoreOrlexQRTIO/VersionLoss.h"
+#include "UtilsRapidXml/Attributes.h"
+
+#include <boost/algorithm/string/join.hpp>
+
+#include <array>
+#include <sstream>
+
+namespace CoreOrlexQRTIO
+{
+namespace
+{
+
+using CoreOrlexTypes::VSubjectApplicationData;
+using CoreOrlexTypes::VSubjectParametrised;
+using UtilsRapidXml::VVersion;
+using VTexts = std::vector<std::string>;
+using VReals = std::vector<double>;
+using VTarget = VSubjectParametrised::VTarget;
+
+VTexts AllVersions()
+{
+	VTexts versions;
+	std::istringstream stream(AllVersionTexts());
+	for (std::string version; stream >> version;)
+		versions.push_back(version);
+	return versions;
+}
+
+/// One kept file for each version of the format, all of the same subject as far as the version can tell it.
+class FrozenFile : public testing::TestWithParam<std::string>
+{
+protected:
+	void SetUp() override
+	{
+		ASSERT_TRUE(UtilsRapidXml::ToValue(GetParam(), m_Version));
+		m_VersionValue = VersionValueFromText(GetParam()).value();
+		m_Content = ReadText(ReadBytes(DataPath("version-" + GetParam() + ".qrs")));
+		ASSERT_TRUE(m_Content.m_bRead) << boost::join(m_Content.m_Errors, "\n");
+	}
+
+	bool From(std::int32_t i_Major, std::int32_t i_Minor) const { return m_Version >= VVersion{i_Major, i_Minor}; }
+
+	VVersion m_Version;
+	std::uint32_t m_VersionValue = 0;
+	VContent m_Content;
+};
+
+INSTANTIATE_TEST_SUITE_P(Versions, FrozenFile, testing::ValuesIn(AllVersions()),
+    [](const auto& i_rInfo) { return "Version" + i_rInfo.param.substr(0, 1) + "_" + i_rInfo.param.substr(2); });
+
+TEST(Versions, AllAreThere)
+{
+	EXPECT_EQ(AllVersionTexts(), "1.0 1.5 2.0 2.1 2.2 2.3 2.4 2.5 2.6 3.0 3.1 3.2 3.3 3.4 3.5");
+	EXPECT_EQ(VersionValueFromText("2.6"), 9u);
+	EXPECT_EQ(VersionValueFromText("3.0"), 11u);
+	EXPECT_EQ(VersionValueFromText("3.5"), 16u);
+	EXPECT_EQ(VersionValueFromText("3.6"), std::nullopt);
+	EXPECT_EQ(VersionValueFromText("3"), std::nullopt);
+	EXPECT_FALSE(VersionFromValue(10).IsSet());
+}
+
+TEST_P(FrozenFile, TellsItsSegments)
+{
+	const auto& rSegments = m_Content.m_Subject.m_Segments;
+	EXPECT_EQ(m_Content.m_Warnings, VTexts());
+	ASSERT_EQ(rSegments.size(), 7u);
+	const char* const names[] = {"Hips", "Spine", "Shoulder", "Slide", "Tip", "Knee", "Prop"};
+	const std::uint32_t parents[] = {0xFFFFFFFFu, 0, 1, 2, 3, 0, 0xFFFFFFFFu};
+	const std::uint32_t depths[] = {0, 1, 2, 3, 4, 1, 0};
+	for (std::size_t i = 0; i < 7; ++i)
+	{
+		EXPECT_EQ(rSegments[i].m_Name, names[i]);
+		EXPECT_EQ(rSegments[i].m_SegmentIndex, i);
+		EXPECT_EQ(rSegments[i].m_ParentSegmentIndex, parents[i]);
+		EXPECT_EQ(rSegments[i].m_TreeDepth, depths[i]);
+	}
+	const bool bNoPose = m_Version == VVersion{1, 5};
+	using VTriple = std::array<std::string, 3>;
+	const auto& rSpine = rSegments[1];
+	EXPECT_EQ(rSpine.m_PreTranslation,
+	    bNoPose ? VTriple({"0", "0", "0"}) : VTriple({"0", From(2, 0) ? "20*Scale" : "20", "0"}));
+	EXPECT_EQ(rSpine.m_PreRotation, bNoPose ? VTriple({"0", "0", "0"}) : VTriple({"0", "0.25", "0"}));
+	EXPECT_EQ(rSpine.m_Bounds[5], "3*Scale");
+	EXPECT_EQ(rSpine.m_MassExpression, From(2, 0) ? "0.25*Total" : "");
+	EXPECT_EQ(rSpine.m_MassCentreExpressions[2], From(2, 0) ? "10*Scale" : "");
+	EXPECT_EQ(rSpine.m_RadiusOfGyrationExpressions[0], From(2, 0) ? "1" : "");
+
+	const VSubjectApplicationData::VSegment& rDisplay = m_Content.m_ApplicationData.m_Segments[1];
+	EXPECT_EQ(rDisplay.m_Colour.m_Green, 20);
+	EXPECT_EQ(rDisplay.m_Colour.m_Alpha, From(3, 0) ? 200 : 255);
+	EXPECT_EQ(rDisplay.m_Visible, !From(3, 0));
+	EXPECT_EQ(rDisplay.m_Context, From(2, 0) ? "Left" : "");
+	EXPECT_EQ(rDisplay.m_Part, From(3, 0) ? "arm" : "");
+	EXPECT_EQ(rDisplay.m_DrawWidth, From(3, 0) ? 2.5 : 0.5);
+	EXPECT_EQ(rDisplay.m_DrawStyle,
+	    From(3, 0) ? VSubjectApplicationData::VSegment::EDrawStyleSpine
+	               : VSubjectApplicationData::VSegment::EDrawStyleBox);
+	EXPECT_EQ(rDisplay.m_Joint.m_EulerOrder, VSubjectApplicationData::VJoint::EZYX);
+	EXPECT_EQ(rDisplay.m_Joint.m_Labels, "a b c");
+	EXPECT_EQ(m_Content.m_Extras.m_Segments[1].m_Size, "old size");
+	EXPECT_EQ(m_Content.m_Extras.m_Segments[1].m_Joint.m_Bounds, "bounds SpineJoint");
+}
+
+TEST_P(FrozenFile, TellsItsJoints)
+{
+	const auto& rSegments = m_Content.m_Subject.m_Segments;
+	const auto& rShoulder = rSegments[2];
+	EXPECT_EQ(rShoulder.m_Joint.m_Mean, VReals({0.25, -0.25}));
+	EXPECT_EQ(rShoulder.m_Joint.m_Covariance, VReals({10, 0, 0, 11}));
+	EXPECT_EQ(rShoulder.m_Joint.m_TemplateMean, From(2, 0) ? VReals({0.25, 0.25}) : VReals());
+	EXPECT_EQ(rShoulder.m_Joint.m_TPoseMean, From(2, 1) ? VReals({0.5, 0.5}) : VReals());
+	EXPECT_EQ(rShoulder.m_Joint.m_TPoseCovariance, From(2, 1) ? VReals({4, 0, 0, 4}) : VReals());
+	EXPECT_EQ(rShoulder.m_Joint.m_RangeMatrix, From(3, 0) ? VReals({2, 0, 0, 2}) : VReals());
+	EXPECT_EQ(rShoulder.m_Joint.m_TemplateRangeCentringState, From(3, 0) ? VReals({0.375, 0.375}) : VReals());
+	EXPECT_EQ(rShoulder.m_Joint.m_BindPose, From(3, 5) ? VReals({0.75, 0.75}) : VReals());
+	EXPECT_EQ(rSegments[4].m_Joint.m_Mean, VReals());
+
+	// Up to 3.1 the pose of the child is an expression that has to be inverted.
+	using VTriple = std::array<double, 3>;
+	const VTriple expected = From(3, 2) ? VTriple{-1, -2, -3} : From(2, 0) ? VTriple{-1, -2, -4.5} : VTriple{};
+	EXPECT_EQ(rShoulder.m_InversePostTranslation, expected);
+	EXPECT_EQ(rSegments[5].m_InversePostRotation[2], From(2, 0) ? -0.5 : 0.0);
+
+	// The way back from the knee to the hips is Y, the axis X: Z to X, X to Y, a third of a turn about the diagonal.
+	if (m_Version != VVersion{1, 5})
+	{
+		for (const double component : rSegments[5].m_Joint.m_JointOrientation)
+			EXPECT_NEAR(component, 1.2091995761561452, 1e-15);
+	}
+
+	const double none = CoreOrlexTypes::c_NotSet;
+	EXPECT_EQ(m_Content.m_Subject.m_TPoseConstraints, VReals({0, 0, 0, none, none, none, 0, none, none, none}));
+}
+
+TEST_P(FrozenFile, TellsItsMarkersTargetsAndParameters)
+{
+	const VSubjectParametrised& rSubject = m_Content.m_Subject;
+	EXPECT_EQ(rSubject.m_MarkerSetName, "Full");
+	ASSERT_EQ(rSubject.m_Markers.size(), 6u);
+	using VMarker = VSubjectParametrised::VMarker;
+	EXPECT_EQ(rSubject.m_Markers[1].m_Missing, From(2, 0));
+	EXPECT_EQ(rSubject.m_Markers[1].m_Status, From(2, 0) ? VMarker::EOptional : VMarker::ERequired);
+	EXPECT_EQ(rSubject.m_Markers[3].m_Status, From(2, 0) ? VMarker::ECalibrationOnly : VMarker::ERequired);
+	EXPECT_EQ(rSubject.m_Markers[0].m_ViewAngle, From(2, 6) ? 0.5 : 0.0);
+	EXPECT_EQ(m_Content.m_Extras.m_Markers[0].m_Descriptor, From(2, 0) && !From(2, 6) ? "describes HIP1" : "");
+	EXPECT_EQ(m_Content.m_ApplicationData.m_Sticks[0].m_ColourB.m_Red, From(3, 0) ? 6 : 9);
+
+	const std::size_t targets = From(3, 5) ? 7 : From(3, 4) ? 6 : From(3, 0) ? 4 : 6;
+	ASSERT_EQ(rSubject.m_Targets.size(), targets);
+	const VTarget& rPoint = rSubject.m_Targets[0];
+	EXPECT_EQ(rPoint.m_Type, VTarget::ELocalPointToWorldPoint);
+	EXPECT_EQ(rPoint.m_StateExpressions, VTexts({From(2, 0) ? "1*Scale" : "1", "0", "0"}));
+	EXPECT_EQ(rPoint.m_Covariance, VReals({1, 0, 0, 0, 2, 0, 0, 0, 3}));
+	EXPECT_EQ(rPoint.m_TemplateCovariance.size(), From(2, 0) ? 9u : 0u);
+	EXPECT_EQ(rPoint.m_PlacementCovariance.size(), From(3, 3) ? 9u : 0u);
+	EXPECT_EQ(rPoint.m_CalibrationWeight, From(3, 5) ? 0.5 : 1.0);
+	EXPECT_EQ(m_Content.m_ApplicationData.m_Targets[0].m_Name, From(3, 0) ? "point" : "HIP1");
+	const VTarget& rSecond = rSubject.m_Targets[1];
+	EXPECT_EQ(rSecond.m_ViewNormals[0][2], m_Version == VVersion({2, 6}) ? 1.0 : 0.0);
+	if (From(3, 0))
+	{
+		EXPECT_EQ(rSecond.m_Type, VTarget::ELocalPlaneToWorldPointGaussian);
+		EXPECT_EQ(rSubject.m_Targets[2].m_StateExpressions, VTexts({"4*Scale", "5", "6", "0", "1", "0"}));
+		const VTarget& rBody = rSubject.m_Targets[3];
+		EXPECT_EQ(rBody.m_Type, VTarget::ERigidBody);
+		EXPECT_EQ(rBody.m_MarkerIndices, std::vector<std::uint32_t>({3, 4, 5}));
+		EXPECT_EQ(rBody.m_StateExpressions,
+		    VTexts({"1", "2", "3", "0", "0", From(3, 1) ? "0.5" : "0", "10", "0", "0", "0", "10*Scale", "0", "0", "0",
+		        "10"}));
+		ASSERT_EQ(rBody.m_Covariance.size(), 63u);
+		EXPECT_EQ(rBody.m_Covariance[35], From(3, 1) ? 6.0 : 0.0);
+		EXPECT_EQ(rBody.m_Covariance[62], 2.0);
+	}
+	if (From(3, 4))
+	{
+		const VTarget& rTurn = rSubject.m_Targets[4];
+		EXPECT_EQ(rTurn.m_RotationCalibrationBehaviour, From(3, 5) ? VTarget::EHingeLike : VTarget::EOther);
+		EXPECT_EQ(rTurn.m_RotationTargetOrientation.size(), From(3, 5) ? 3u : 0u);
+		EXPECT_EQ(rTurn.m_Weight, 3.0);
+		EXPECT_EQ(m_Content.m_ApplicationData.m_Targets[4].m_Colour.m_Alpha, 64);
+	}
+	EXPECT_EQ(rSubject.m_Rotations.size(), From(3, 4) ? 2u : 0u);
+
+	EXPECT_EQ(rSubject.m_StaticParameters.size(), From(2, 0) ? 2u : 0u);
+	ASSERT_EQ(rSubject.m_DynamicParameters.size(), 1u);
+	EXPECT_EQ(rSubject.m_DynamicParameters[0].m_Value, 1.5);
+	EXPECT_EQ(rSubject.m_DynamicParameters[0].m_Prior, From(2, 0) ? 1.25 : 0.0);
+	EXPECT_EQ(rSubject.m_DynamicParameters[0].m_Visible, From(2, 0));
+	EXPECT_EQ(m_Content.m_ApplicationData.m_Skin, From(3, 3) ? "suit" : "");
+	EXPECT_EQ(rSubject.m_ModelVersion, From(3, 5) ? "7" : "");
+	EXPECT_EQ(m_Content.m_ApplicationData.m_RetargetSourceSubject, From(3, 5) ? "Someone" : "");
+	EXPECT_EQ(m_Content.m_Extras.m_DynamicSubspaces.size(), From(3, 5) ? 1u : 0u);
+}
+
+TEST_P(FrozenFile, ComesBackEqualAtItsOwnVersion)
+{
+	const std::string first = WriteText(m_Content, m_VersionValue);
+	const VContent again = ReadText(first);
+	EXPECT_TRUE(again.m_bRead) << boost::join(again.m_Errors, "\n");
+	EXPECT_EQ(again.m_Warnings, c_WrittenFileWarnings);
+	ExpectSame(m_Content, again);
+	EXPECT_TRUE(WriteText(again, m_VersionValue) == first);
+	EXPECT_EQ(ListVersionLosses(m_Content.m_Subject, m_Content.m_ApplicationData, m_Content.m_Extras, m_VersionValue),
+	    VTexts());
+}
+
+/// What a subject of 3.5 becomes at this version can be read again, and is stable from then on.
+TEST_P(FrozenFile, TakesASubjectOfTheLatestVersion)
+{
+	const std::string first = WriteText(ReadText(ReadBytes(DataPath("version-3.5.qrs"))), m_VersionValue);
+	const VContent again = ReadText(first);
+	EXPECT_TRUE(again.m_bRead) << boost::join(again.m_Errors, "\n");
+	EXPECT_EQ(again.m_Warnings, c_WrittenFileWarnings);
+	EXPECT_TRUE(WriteText(again, m_VersionValue) == first);
+}
+
+TEST(Versions, LossesAreCounted)
+{
+	const VContent content = ReadText(ReadBytes(DataPath("version-3.5.qrs")));
+	const auto losses = [&](const char* i_pVersion)
+	{
+		return ListVersionLosses(
+		    content.m_Subject, content.m_ApplicationData, content.m_Extras, VersionValueFromText(i_pVersion).value());
+	};
+	EXPECT_EQ(losses("3.5"), VTexts());
+	EXPECT_EQ(losses("3.4"),
+	    VTexts({"the model version", "the retarget source template", "the retarget source subject", "6 bind poses",
+	        "1 target", "2 calibration weights", "2 calibration behaviours", "1 dynamic subspace"}));
+	EXPECT_EQ(losses("2.6"),
+	    VTexts({"the model version", "the retarget source template", "the retarget source subject", "the skin",
+	        "6 joint ranges", "6 bind poses", "7 segment draw settings", "1 stick colour", "6 targets",
+	        "1 target weight", "1 calibration weight", "1 placement covariance", "1 target display setting",
+	        "2 rotation observations", "1 dynamic subspace"}));
+}
+
+} // namespace
+} // namespace CoreOrlexQRTIO
