@@ -3,8 +3,10 @@
 
 #include <gtest/gtest.h>
 
+#include <clocale>
 #include <cmath>
 #include <limits>
+#include <locale>
 
 namespace
 {
@@ -60,6 +62,25 @@ TEST(Attributes, Reals)
 	for (const char* pText :
 	    {"", " ", "1 ", "1,5", "1.5x", "1 2", "abc", "nan", "NaN", "inf", "-inf", "Infinity", "1e400", "-1e400", "1e"})
 		ExpectRefused<double>(pText);
+}
+
+/// In the language of the environment, which may write a comma and group digits.
+TEST(Attributes, AreTheSameInEveryLanguage)
+{
+	const std::string before = std::setlocale(LC_ALL, nullptr);
+	if (!std::setlocale(LC_ALL, ""))
+		GTEST_SKIP() << "the environment's language is not installed";
+	const std::locale global = std::locale::global(std::locale(""));
+	ExpectValue("1234.5", 0.0, 1234.5);
+	ExpectRefused<double>("1234,5");
+	ExpectRefused<double>("1.234.5");
+	ExpectValue<std::int32_t>("12345", 0, 12345);
+	EXPECT_EQ(ToText({3000, 50000}), "3000.50000");
+	VMessages messages;
+	messages.Add("%1% of %2%", 1234567, 0.5);
+	EXPECT_EQ(messages.GetTexts()[0], "1234567 of 0.5");
+	std::locale::global(global);
+	std::setlocale(LC_ALL, before.c_str());
 }
 
 TEST(Attributes, Integers)

@@ -1,6 +1,7 @@
 #include "UtilsRapidXml/ReaderNode.h"
 #include "UtilsRapidXml/Limits.h"
 
+#include <boost/thread/thread.hpp>
 #include <gtest/gtest.h>
 
 namespace
@@ -198,6 +199,41 @@ TEST(ReaderNode, EmptiesItsDeclarations)
 	    });
 	EXPECT_EQ(result.m_Visited, (VTexts{"b", "a"}));
 	EXPECT_TRUE(result.m_Errors.empty());
+}
+
+/// The depth that is allowed fits into the small stack of a worker thread.
+TEST(ReaderNode, WalksTheDeepestFileOnASmallStack)
+{
+	std::string text;
+	for (std::size_t i = 0; i < c_MaximumDepth; ++i)
+		text += "<r n='1'>";
+	for (std::size_t i = 0; i < c_MaximumDepth; ++i)
+		text += "</r>";
+	std::size_t visited = 0;
+	boost::thread::attributes attributes;
+#ifdef NDEBUG
+	attributes.set_stack_size(512 << 10);
+#else
+	// Frames that are not optimised, or watched by a sanitizer, take several times as much.
+	attributes.set_stack_size(4096 << 10);
+#endif
+	boost::thread thread(attributes,
+	    [&]
+	    {
+		    VDocument document;
+		    std::string error;
+		    ASSERT_TRUE(document.Parse(text, error)) << error;
+		    VReaderNode root(document, true);
+		    std::function<void(INode&)> format = [&](INode& io_rNode)
+		    {
+			    ++visited;
+			    io_rNode.DeclareElement("r", "", 0, 1);
+			    io_rNode.ProcessElements(format);
+		    };
+		    format(root);
+	    });
+	thread.join();
+	EXPECT_EQ(visited, c_MaximumDepth + 1);
 }
 
 /// A path is repeated by each unknown attribute below it: what is kept stays bounded, what is counted is complete.

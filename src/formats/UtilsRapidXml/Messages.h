@@ -3,6 +3,7 @@
 #include <boost/format.hpp>
 
 #include <cstddef>
+#include <locale>
 #include <string>
 #include <vector>
 
@@ -24,7 +25,8 @@ public:
 		if (IsFull())
 			++m_Count;
 		else
-			Add((boost::format(i_pFormat) % ... % Value(i_rArguments)).str());
+			// Numbers as they are, whatever the process' locale groups.
+			Add((boost::format(i_pFormat, std::locale::classic()) % ... % Value(i_rArguments)).str());
 	}
 
 	std::size_t GetCount() const { return m_Count; }
