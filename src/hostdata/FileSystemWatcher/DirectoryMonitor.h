@@ -19,7 +19,7 @@ struct VSystemEvent
 	/// What Add returned.
 	int m_Watch = 0;
 	EFileChange m_Change = EAdded;
-	/// Name within the directory; empty for an error.
+	/// Name within the directory in UTF-8; empty for an error.
 	std::string m_Name = {};
 	bool m_bDirectory = false;
 	/// Joins the two halves of a rename; 0 for none. A half without its partner is a file that came or went.

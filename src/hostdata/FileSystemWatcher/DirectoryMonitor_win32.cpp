@@ -3,6 +3,7 @@
 #include <windows.h>
 
 #include "FileSystemWatcher/DirectoryMonitor.h"
+#include "UtilsFileSystem/Paths.h"
 
 #include <boost/filesystem/operations.hpp>
 #include <boost/system/system_error.hpp>
@@ -29,14 +30,6 @@ constexpr ULONG_PTR c_StopKey = 0;
 std::string ErrorText(DWORD i_Error)
 {
 	return boost::system::system_category().message(int(i_Error));
-}
-
-std::string ToUtf8(const wchar_t* i_pText, int i_Length)
-{
-	const int size = ::WideCharToMultiByte(CP_UTF8, 0, i_pText, i_Length, nullptr, 0, nullptr, nullptr);
-	std::string text(size, '\0');
-	::WideCharToMultiByte(CP_UTF8, 0, i_pText, i_Length, text.data(), size, nullptr, nullptr);
-	return text;
 }
 
 /// A directory with the read that the system holds on its buffer.
@@ -188,7 +181,7 @@ private:
 			VSystemEvent event;
 			event.m_Watch = i_Watch;
 			event.m_Change = EFileChange(pInformation->Action);
-			event.m_Name = ToUtf8(name.data(), int(name.size()));
+			event.m_Name = UtilsFileSystem::ToUtf8(name);
 			event.m_bDirectory = boost::filesystem::is_directory(i_rRead.m_Path / name, error);
 			io_rEvents.push_back(std::move(event));
 			if (pInformation->NextEntryOffset == 0)

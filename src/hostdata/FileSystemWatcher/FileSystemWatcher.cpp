@@ -2,6 +2,7 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "FileSystemWatcher/DirectoryMonitor.h"
+#include "UtilsFileSystem/Paths.h"
 
 #include <boost/algorithm/string/predicate.hpp>
 #include <boost/filesystem/operations.hpp>
@@ -97,7 +98,7 @@ struct VFileSystemWatcher::VState
 		{
 			if (!i_rEvent.m_Error.empty())
 			{
-				LogFailure(rpDirectory->m_Path.string() + ": " + i_rEvent.m_Error);
+				LogFailure(UtilsFileSystem::ToUtf8(rpDirectory->m_Path) + ": " + i_rEvent.m_Error);
 				rpDirectory->m_Directories.Fire(i_rEvent.m_bEnded ? ERemoved : EModified, rpDirectory->m_Path);
 			}
 			else if (i_rEvent.m_Change < EAdded || i_rEvent.m_Change > ERenamedNew)
@@ -111,7 +112,7 @@ struct VFileSystemWatcher::VState
 
 	void DeliverChange(VDirectory& i_rDirectory, const VSystemEvent& i_rEvent)
 	{
-		const path file = i_rDirectory.m_Path / i_rEvent.m_Name;
+		const path file = i_rDirectory.m_Path / UtilsFileSystem::PathFromUtf8(i_rEvent.m_Name);
 		(i_rEvent.m_bDirectory ? i_rDirectory.m_Directories : i_rDirectory.m_Files).Fire(i_rEvent.m_Change, file);
 		bool bListed = false;
 		{
@@ -119,7 +120,8 @@ struct VFileSystemWatcher::VState
 			bListed = i_rDirectory.m_bListed;
 		}
 		if (!bListed || i_rEvent.m_bDirectory
-		    || (!m_Extension.empty() && !boost::algorithm::iequals(file.extension().string(), m_Extension)))
+		    || (!m_Extension.empty()
+		        && !boost::algorithm::iequals(UtilsFileSystem::ToUtf8(file.extension()), m_Extension)))
 			return;
 		switch (i_rEvent.m_Change)
 		{
@@ -213,7 +215,7 @@ void VFileSystemWatcher::SetDirectories(const std::set<path>& i_rDirectories)
 			}
 			catch (const boost::system::system_error& rError)
 			{
-				failures.push_back(rDirectory.string() + ": " + rError.what());
+				failures.push_back(UtilsFileSystem::ToUtf8(rDirectory) + ": " + rError.what());
 			}
 		std::vector<int> unused;
 		for (const auto& [rKey, rpDirectory] : m_pState->m_Directories)
