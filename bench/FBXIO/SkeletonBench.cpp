@@ -1,0 +1,91 @@
+// The skeleton of a character's FBX file, from the file on: ours, and the import of assimp without any post-processing.
+#include "../Ratios.h"
+
+#include "../../tests/fbxsdk/FbxFileBuilder.h"
+#include "../../tests/fbxsdk/TestFile.h"
+
+#include "FBXIO/FBXReader.h"
+
+#include <assimp/Importer.hpp>
+#include <assimp/config.h>
+#include <assimp/scene.h>
+
+#include <list>
+
+namespace
+{
+
+/// 0 if there are none.
+std::size_t Bones(const std::string& i_rPath)
+{
+	FBXIO::FBXReader reader;
+	return reader.LoadFile(i_rPath) && reader.HasSkeleton() ? reader.GetSkeleton()->size() : 0;
+}
+
+void CountPerBone(benchmark::State& io_rState, std::size_t i_Bones)
+{
+	io_rState.counters["per bone"] = benchmark::Counter(
+	    double(i_Bones), benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
+}
+
+void Skeleton(benchmark::State& io_rState, const std::string& i_rPath)
+{
+	const std::size_t bones = Bones(i_rPath);
+	for (auto _ : io_rState)
+		if (bones == 0 || Bones(i_rPath) != bones)
+			io_rState.SkipWithError("not loaded");
+	CountPerBone(io_rState, bones);
+}
+
+void AssimpImport(benchmark::State& io_rState, const std::string& i_rPath)
+{
+	// Made once: what an importer costs without a file is not counted.
+	Assimp::Importer importer;
+	importer.SetPropertyBool(AI_CONFIG_IMPORT_FBX_PRESERVE_PIVOTS, false);
+	for (auto _ : io_rState)
+	{
+		if (!importer.ReadFile(i_rPath, 0))
+			io_rState.SkipWithError(importer.GetErrorString());
+		importer.FreeScene();
+	}
+	CountPerBone(io_rState, Bones(i_rPath));
+}
+
+/// A chain of that many bones.
+void Chain(benchmark::State& io_rState, const FbxTest::VTestForm& i_rForm)
+{
+	FbxTest::VTestScene scene;
+	for (int i = 0; i < io_rState.range(0); ++i)
+		scene.m_Nodes.push_back({"bone" + std::to_string(i), "LimbNode", i - 1,
+		    {{"Lcl Translation", {10.5, 0.25, 0}}, {"Lcl Rotation", {10, 20, 30}}, {"PreRotation", {5, 6, 7}},
+		        {"RotationActive", {1}}}});
+	const FbxTest::VTestFile file(FbxTest::Write(i_rForm, scene));
+	Skeleton(io_rState, file.Path());
+}
+
+} // namespace
+
+int main(int i_Count, char** i_ppArguments)
+{
+	// assimp reads version 7.1 and later.
+	static std::list<std::string> s_Names;
+	std::vector<Ratios::VRatio> ratios;
+	for (const char* pFile : {"heaps_biped_zup_a7100", "kenney_medium_b7400", "own_game_zup_m_b7400",
+	         "own_ns_yup_cm_a7400", "own_ns_yup_cm_b7400", "pab_arnaud_b7500", "ufbx_maya_human_ik_7400_binary"})
+	{
+		const std::string path = std::string(RETARGET_TEST_DATA "/fbx/") + pFile + ".fbx";
+		const std::string& rOurs = s_Names.emplace_back(std::string("Skeleton:") + pFile);
+		const std::string& rPeer = s_Names.emplace_back(std::string("Assimp:") + pFile);
+		benchmark::RegisterBenchmark(rOurs.c_str(), Skeleton, path);
+		benchmark::RegisterBenchmark(rPeer.c_str(), AssimpImport, path);
+		ratios.push_back({rOurs.c_str(), rPeer.c_str(), 0.2});
+	}
+	for (const FbxTest::VTestForm& rForm : FbxTest::c_Forms)
+	{
+		auto* const pChain =
+		    benchmark::RegisterBenchmark((std::string("Chain:") + rForm.m_pName).c_str(), Chain, rForm);
+		for (const int bones : {30, 100, 300, 1000, 3000})
+			pChain->Arg(bones);
+	}
+	return Ratios::Main(i_Count, i_ppArguments, ratios);
+}
