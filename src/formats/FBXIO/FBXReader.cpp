@@ -1,8 +1,9 @@
 #include "FBXIO/FBXReader.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "UtilsFileSystem/Paths.h"
 
-#include <boost/filesystem.hpp>
+#include <boost/filesystem/operations.hpp>
 
 #include <fbxsdk.h>
 
@@ -88,7 +89,7 @@ FBXIO::FBXReader::VImpl::~VImpl()
 bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 {
 	boost::system::error_code error;
-	if (boost::filesystem::status(i_rPath, error).type() != boost::filesystem::regular_file)
+	if (status(UtilsFileSystem::PathFromUtf8(i_rPath), error).type() != boost::filesystem::regular_file)
 	{
 		NVX_LOG("FBXIO", NVX::ELogError, "File %1% not found", i_rPath);
 		return false;

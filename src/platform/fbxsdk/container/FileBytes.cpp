@@ -1,30 +1,28 @@
 #include "fbxsdk/container/FileBytes.h"
 
+#include "UtilsFileSystem/Files.h"
+#include "UtilsFileSystem/Paths.h"
 #include "fbxsdk/Limits.h"
 
-#include <boost/filesystem.hpp>
+#include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
 #include <cstdio>
 
 bool FbxFile::VFileBytes::Read(const std::string& i_rPath, std::size_t i_Limit, std::string& o_rReason)
 {
+	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(i_rPath);
 	boost::system::error_code error;
-	if (!boost::filesystem::is_regular_file(i_rPath, error))
-	{
-		o_rReason = "File cannot be opened";
-		return false;
-	}
-	const boost::uintmax_t size = boost::filesystem::file_size(i_rPath, error);
-	if (error || size > Limits::c_FileBytes)
-	{
-		o_rReason = error ? "File cannot be opened" : "File is larger than 2 GiB";
-		return false;
-	}
-	const std::unique_ptr<std::FILE, int (*)(std::FILE*)> pFile(std::fopen(i_rPath.c_str(), "rb"), &std::fclose);
+	const boost::uintmax_t size = boost::filesystem::file_size(path, error);
+	const UtilsFileSystem::VFile pFile = error ? nullptr : UtilsFileSystem::OpenFile(path, "rb");
 	if (!pFile)
 	{
 		o_rReason = "File cannot be opened";
+		return false;
+	}
+	if (size > Limits::c_FileBytes)
+	{
+		o_rReason = "File is larger than 2 GiB";
 		return false;
 	}
 	// One large read goes past the stream's buffer, and new char[] leaves the bytes as they are.

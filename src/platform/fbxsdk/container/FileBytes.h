@@ -13,7 +13,7 @@ namespace FbxFile
 class VFileBytes
 {
 public:
-	/// False with a reason if the file cannot be opened, is no plain file, or is larger than c_FileBytes.
+	/// False with a reason if the file cannot be opened or is larger than c_FileBytes.
 	/// i_Limit bytes at most are read.
 	bool Read(const std::string& i_rPath, std::size_t i_Limit, std::string& o_rReason);
 

@@ -1,5 +1,6 @@
 #include "fbxsdk/document/Document.h"
 
+#include "fbxsdk/Limits.h"
 #include "fbxsdk/container/Values.h"
 
 #include <algorithm>
@@ -23,6 +24,10 @@ FbxFile::VDocument::VDocument(const VElementTree& i_rTree) : m_rTree(i_rTree)
 {
 	const VElementIndex first = m_rTree[VElementTree::c_Root].m_FirstChild;
 	m_bEscapes = first != c_NoElement && m_rTree[first].m_Form != EValueForm::Binary;
+	// A file that was cut behind a section looks whole but for what follows.
+	for (const char* pSection : {"Objects", "Connections"})
+		if (m_Error.empty() && m_rTree.Find(VElementTree::c_Root, pSection) == c_NoElement)
+			m_Error = std::string("its section \"") + pSection + "\" is missing";
 	ReadObjects();
 	ReadConnections();
 }
@@ -35,6 +40,11 @@ void FbxFile::VDocument::ReadObjects()
 			continue;
 		for (const VElementIndex element : m_rTree.Children(section))
 		{
+			if (m_Objects.size() == Limits::c_Objects)
+			{
+				m_Error = "it has more objects than are read";
+				break;
+			}
 			VValueCursor values(m_rTree, element);
 			const VObjectIndex index = VObjectIndex(m_Objects.size());
 			VValue value = values.Next();
@@ -104,12 +114,4 @@ FbxFile::VElementIndex FbxFile::VDocument::Template(std::string_view i_Kind) con
 		if (m_rTree.Name(type) == "ObjectType" && ValueAt(m_rTree, type, 0).m_Text == i_Kind)
 			return m_rTree.Find(type, "PropertyTemplate");
 	return c_NoElement;
-}
-
-std::string_view FbxFile::VDocument::MissingSection() const
-{
-	for (const std::string_view name : {std::string_view("Objects"), std::string_view("Connections")})
-		if (m_rTree.Find(VElementTree::c_Root, name) == c_NoElement)
-			return name;
-	return {};
 }

@@ -62,8 +62,8 @@ public:
 	/// Texts of this document, for the world outside.
 	std::string Decoded(std::string_view i_Text) const { return DecodeText(i_Text, m_bEscapes); }
 
-	/// What tells that the file is a fragment: the section that is not there, empty if all are.
-	std::string_view MissingSection() const;
+	/// What of the document is missing, empty if nothing is.
+	const std::string& Error() const { return m_Error; }
 
 private:
 	void ReadObjects();
@@ -72,6 +72,7 @@ private:
 
 	const VElementTree& m_rTree;
 	bool m_bEscapes = false;
+	std::string m_Error;
 	std::vector<VObject> m_Objects;
 	std::vector<VConnection> m_Connections;
 	std::vector<std::pair<std::int64_t, VObjectIndex>> m_ByNumber;

@@ -1,6 +1,7 @@
 #include "fbxsdk/scene/SceneBuilder.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "fbxsdk/Limits.h"
 #include "fbxsdk/container/Values.h"
 #include "fbxsdk/document/Properties.h"
 #include "fbxsdk/sdk/NodeData.h"
@@ -92,14 +93,14 @@ FbxFile::VImportResult FbxFile::VSceneBuilder::Build(VFileBytes i_Bytes, const V
 		return result;
 	}
 	rContent.m_pDocument = std::make_unique<VDocument>(rContent.m_Tree);
-	result.m_Error = rContent.m_Tree.Error();
-	if (const std::string_view missing = rContent.m_pDocument->MissingSection();
-	    result.m_Error.empty() && !missing.empty())
-		result.m_Error = "its section \"" + std::string(missing) + "\" is missing";
 	BuildSettings();
-	BuildNodes(i_rKind.m_Version);
+	const bool bAllNodes = BuildNodes(i_rKind.m_Version);
 	Connect();
 	TellUnreached();
+	for (const std::string& rError : {rContent.m_Tree.Error(), rContent.m_pDocument->Error(),
+	         std::string(bAllNodes ? "" : "it has more nodes than are read")})
+		if (result.m_Error.empty())
+			result.m_Error = rError;
 	return result;
 }
 
@@ -130,7 +131,7 @@ void FbxFile::VSceneBuilder::BuildSettings()
 	    });
 }
 
-void FbxFile::VSceneBuilder::BuildNodes(std::uint32_t i_Version)
+bool FbxFile::VSceneBuilder::BuildNodes(std::uint32_t i_Version)
 {
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
 	const VDocument& rDocument = *rContent.m_pDocument;
@@ -153,6 +154,8 @@ void FbxFile::VSceneBuilder::BuildNodes(std::uint32_t i_Version)
 		const VObject& rObject = rDocument.Objects()[object];
 		if (rObject.m_Kind == "Model")
 		{
+			if (rContent.m_Nodes.size() > Limits::c_Nodes)
+				return false;
 			auto* const pNode = new fbxsdk::FbxNode(rDocument.Decoded(rObject.m_Name));
 			rContent.m_Nodes.emplace_back(pNode);
 			m_Built[object].m_pNode = pNode;
@@ -164,6 +167,7 @@ void FbxFile::VSceneBuilder::BuildNodes(std::uint32_t i_Version)
 		else if (rObject.m_Kind == "NodeAttribute")
 			m_Built[object].m_pSkeleton = addSkeleton(rObject);
 	}
+	return true;
 }
 
 void FbxFile::VSceneBuilder::Connect()

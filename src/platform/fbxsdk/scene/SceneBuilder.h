@@ -39,7 +39,8 @@ public:
 
 private:
 	void BuildSettings();
-	void BuildNodes(std::uint32_t i_Version);
+	/// False if there are more than c_Nodes.
+	bool BuildNodes(std::uint32_t i_Version);
 	void Connect();
 	void TellUnreached();
 
