@@ -112,19 +112,6 @@ TEST(JointFK, NormaliseState)
 	}
 }
 
-TEST(JointFK, OrientationIsPreAndPostPose)
-{
-	auto joint = Joint(VJointTypes::EHinge);
-	EXPECT_EQ(Create(joint)->ComputeJointFK().PrePose().R, Rotation::c_Identity3);
-	joint.m_JointOrientation = {c_Pi / 2, 0, 0};
-	const auto pJoint = Create(joint);
-	for (const auto* pPose : {&pJoint->ComputeJointFK().PrePose(), &pJoint->ComputeJointFK().PostPose()})
-	{
-		EXPECT_LT(Reference::Difference(*pPose, Reference::Pose({c_Pi / 2, 0, 0}, {})), 1e-15);
-		EXPECT_EQ(pPose->t, (Rotation::VVector3{}));
-	}
-}
-
 TEST(JointFK, WrongTypesAreRefused)
 {
 	for (const auto type : {VJointTypes::EBadJointType, static_cast<Reference::EJointType>(7),

@@ -165,6 +165,56 @@ TEST(SubjectFK, CloneToAParentOfAnotherDepthIsAsserted)
 	    (std::vector<std::string>{"pCloneFK->m_Depth == i_pParent->TreeDepth() + 1", "pCloneFK->m_Depth == 1"}));
 }
 
+/// Whatever is wrong with a subject, it is refused or can be used; nothing out of range is ever followed.
+TEST(SubjectFK, BrokenSubjectsAreRefusedOrUsable)
+{
+	std::mt19937 random(13);
+	const auto below = [&](std::uint32_t i_Limit)
+	{ return std::uniform_int_distribution<std::uint32_t>(0, i_Limit - 1)(random); };
+	const VAssertions assertions;
+	int refused = 0;
+	int usable = 0;
+	for (int i = 0; i < 5000; ++i)
+	{
+		VSubject subject = WithTargets(random);
+		for (std::uint32_t damage = 1 + below(3); damage > 0; --damage)
+		{
+			VSubject::VSegment& rSegment = subject.m_Segments[below(20)];
+			VTarget& rTarget = subject.m_Targets[below(3)];
+			switch (below(9))
+			{
+			case 0: rSegment.m_ParentSegmentIndex = below(25); break;
+			case 1: rSegment.m_Joint.m_JointType = static_cast<Reference::EJointType>(below(9)); break;
+			case 2: rSegment.m_PreRotation[below(3)] = std::nan(""); break;
+			case 3: rTarget.m_Type = static_cast<VTarget::ETargetType>(below(12)); break;
+			case 4: rTarget.m_State.resize(below(14), 1e300); break;
+			case 5: rTarget.m_MarkerIndices.assign(below(4), below(2) ? 0xFFFFFFFF : 1); break;
+			case 6: rTarget.m_RotationObservationIndices.assign(below(3), below(2) ? 0xFFFFFFFF : 0); break;
+			case 7: rTarget.m_SegmentIndices.assign(below(3), below(25)); break;
+			default: rTarget.m_Weight = below(2) ? -1.0 : std::nan(""); break;
+			}
+		}
+		try
+		{
+			VComputeSubjectFK fk(subject);
+			std::vector<double> state(fk.NumberOfStates(), 1.0);
+			fk.Update(state.data());
+			fk.NormaliseState(state.data());
+			const VResults results(VComputeSubjectFK{fk});
+			EXPECT_EQ(results.m_Markers.size(), fk.NumberOfMarkers());
+			EXPECT_EQ(results.m_Rotations.size(), fk.NumberOfRotations());
+			++usable;
+		}
+		catch (const VConstructionException&)
+		{
+			++refused;
+		}
+	}
+	// Both ways are really taken.
+	EXPECT_GT(refused, 500);
+	EXPECT_GT(usable, 500);
+}
+
 /// Run under ThreadSanitizer this shows that copies share nothing.
 TEST(SubjectFK, CopiesRunInParallel)
 {
