@@ -15,7 +15,7 @@ struct VCreateSettings
 {
 	std::string m_Fbx;
 	std::string m_Source;
-	std::string m_Root;
+	std::optional<std::string> m_Root;
 	std::string m_Out;
 };
 
@@ -32,8 +32,9 @@ EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 	if (!i_rSettings.m_Source.empty())
 		session.LoadSource(i_rSettings.m_Source);
 	session.CreateTarget(i_rSettings.m_Fbx, i_rSettings.m_Root);
-	TellDifferenceFromFile(session, MatchesFilePose(i_rEdits) ? NVX::ELogInformation : NVX::ELogWarning,
-	    "The bind pose as built", "; --match-file-pose mends it");
+	if (const auto worst = DifferenceFromFile(session))
+		TellDifferenceFromFile(session, *worst, MatchesFilePose(i_rEdits) ? NVX::ELogInformation : NVX::ELogWarning,
+		    "The bind pose as built", "; --match-file-pose mends it");
 	ApplyEdits(session, i_rEdits);
 	session.Save(i_rSettings.m_Out);
 	return EFine;

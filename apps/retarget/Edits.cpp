@@ -9,6 +9,8 @@
 #include "RetargetSetupDocument/RetargetTargets.h"
 #include "math/NumberText.h"
 
+#include <algorithm>
+
 namespace CommandLine
 {
 namespace
@@ -111,10 +113,11 @@ void Pose(VSession& io_rSession, const std::string& i_rValue)
 		throw VCommandError(EWrongUsage,
 		    "--pose: \"" + subject.m_Segments[index].m_Name
 		        + "\" has no joint that could move; --create-joints before it gives it one");
-	if (values.size() > size)
+	if (values.size() != std::min<std::size_t>(size, 3) && values.size() != size)
 		throw VCommandError(EWrongUsage,
-		    "--pose: the joint of \"" + subject.m_Segments[index].m_Name + "\" takes " + std::to_string(size)
-		        + " numbers, not " + std::to_string(values.size()));
+		    "--pose: the joint of \"" + subject.m_Segments[index].m_Name + "\" takes " + (size > 3 ? "3 or " : "")
+		        + std::to_string(size) + " numbers, not " + std::to_string(values.size()));
+	// A rotation alone leaves the root where it is.
 	rJoint.m_BindPose.resize(size);
 	std::copy(values.begin(), values.end(), rJoint.m_BindPose.begin());
 	rJoint.m_Mean = rJoint.m_BindPose;
@@ -134,7 +137,11 @@ void MatchFilePose(VSession& io_rSession, const std::string&)
 	if (!match.m_PreRotations.empty())
 		NVX_LOG(c_pCategory, NVX::ELogInformation, "--match-file-pose: %1% segments without a joint were turned",
 		    match.m_PreRotations.size());
-	TellDifferenceFromFile(io_rSession, NVX::ELogWarning, "After --match-file-pose the bind pose", "");
+	// What lengths within a thousandth of the file's add up to is no concern.
+	if (const auto worst = DifferenceFromFile(io_rSession))
+		TellDifferenceFromFile(io_rSession, *worst,
+		    worst->m_Distance > 1.0 || worst->m_Angle > 1e-3 ? NVX::ELogWarning : NVX::ELogInformation,
+		    "After --match-file-pose the bind pose", "");
 }
 
 void UpdateTargets(VSession& io_rSession, const std::string&)

@@ -28,9 +28,10 @@ std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_r
 	for (const FBXIO::VSkinBone& rBone : i_rSkeleton)
 		bones.m_Names.push_back(rBone.m_Name);
 	// The name comes first: a bone may be called by a number.
-	if (std::find(bones.m_Names.begin(), bones.m_Names.end(), i_rWord) != bones.m_Names.end() || i_rWord[0] == '#')
+	if (std::find(bones.m_Names.begin(), bones.m_Names.end(), i_rWord) != bones.m_Names.end()
+	    || i_rWord.starts_with('#'))
 		return FindElement(i_rWord, bones);
-	if (i_rWord.find_first_not_of("0123456789") == std::string::npos)
+	if (!i_rWord.empty() && i_rWord.find_first_not_of("0123456789") == std::string::npos)
 		return FindElement("#" + i_rWord, bones);
 	// Or as the segment will be called, without the namespace.
 	for (std::string& rName : bones.m_Names)
@@ -53,6 +54,11 @@ void VSession::LoadSource(const std::string& i_rPath)
 	if (!m_pDocument->LoadSourceSubject(i_rPath, ""))
 		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a source skeleton");
 	Settle();
+	const auto pData = m_pDocument->TargetValues().m_pApplicationData;
+	if (pData && !pData->m_RetargetSourceTemplate.empty()
+	    && pData->m_RetargetSourceTemplate != m_pDocument->GetSourceName())
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "The retarget subject was made for the source \"%1%\", not for \"%2%\"",
+		    pData->m_RetargetSourceTemplate, m_pDocument->GetSourceName());
 }
 
 void VSession::LoadTarget(const std::string& i_rPath)
@@ -67,7 +73,7 @@ void VSession::LoadTarget(const std::string& i_rPath)
 	Settle();
 }
 
-void VSession::CreateTarget(const std::string& i_rPath, const std::string& i_rRoot)
+void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot)
 {
 	if (!m_pDocument->LoadTargetFBX(i_rPath))
 		throw VCommandError(EBadInput,
@@ -79,9 +85,9 @@ void VSession::CreateTarget(const std::string& i_rPath, const std::string& i_rRo
 		    "\"" + i_rPath + "\" could be read only in part: " + std::to_string(pSkeleton->size())
 		        + " bones up to where it broke off");
 	std::size_t root = 0;
-	if (!i_rRoot.empty())
+	if (i_rRoot)
 	{
-		root = FindRoot(i_rRoot, *pSkeleton);
+		root = FindRoot(*i_rRoot, *pSkeleton);
 		m_pDocument->SetTargetRootIndex(std::uint32_t(root));
 	}
 	m_pDocument->CreateTargetSubject();
@@ -122,19 +128,21 @@ std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectV
 	return pFK ? RetargetSetup::SegmentPoses(*pFK) : std::vector<Rotation::VPose<double>>();
 }
 
-void TellDifferenceFromFile(VSession& io_rSession, int i_Level, const char* i_pWhat, const char* i_pHint)
+std::optional<RetargetSetup::VPoseDifference> DifferenceFromFile(VSession& io_rSession)
 {
-	const auto values = io_rSession.Document().TargetValues();
 	const VCharacterFile& rFile = *io_rSession.File();
-	const auto worst = RetargetSetup::WorstPoseDifference(
+	return RetargetSetup::WorstPoseDifference(
 	    RetargetSetup::PosesInFile(rFile.m_Bones, rFile.m_Axis, io_rSession.Document().GetTargetScale()),
-	    BindPosesOf(values, "target"));
-	if (!worst)
-		return;
-	const std::string& rName = values.m_pParametrised->m_Segments[worst->m_SegmentIndex].m_Name;
+	    BindPosesOf(io_rSession.Document().TargetValues(), "target"));
+}
+
+void TellDifferenceFromFile(VSession& io_rSession, const RetargetSetup::VPoseDifference& i_rWorst, int i_Level,
+    const char* i_pWhat, const char* i_pHint)
+{
 	NVX_LOG(c_pCategory, i_Level,
-	    "%1% differs from the pose in the file, at worst \"%2%\" by %3$.1f mm and %4$.1f degrees%5%", i_pWhat, rName,
-	    worst->m_Distance, worst->m_Angle * 180.0 / std::numbers::pi, i_pHint);
+	    "%1% differs from the pose in the file, at worst \"%2%\" by %3$.1f mm and %4$.1f degrees%5%", i_pWhat,
+	    io_rSession.Target().m_Segments[i_rWorst.m_SegmentIndex].m_Name, i_rWorst.m_Distance,
+	    i_rWorst.m_Angle * 180.0 / std::numbers::pi, i_pHint);
 }
 
 } // namespace CommandLine

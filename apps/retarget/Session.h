@@ -4,6 +4,7 @@
 
 #include "FBXIO/SkinSkeleton.h"
 #include "InMemoryHost/Dispatcher.h"
+#include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "numerics/Rotation.h"
 
@@ -31,13 +32,13 @@ class VSession
 public:
 	VSession();
 
-	/// EBadInput if the file cannot be read.
+	/// EBadInput if the file cannot be read. Tells if the target subject was made for another source.
 	void LoadSource(const std::string& i_rPath);
 	void LoadTarget(const std::string& i_rPath);
 
-	/// Reads the FBX file and makes the target subject of it, from the root bone of this name or index on; an empty
-	/// text leaves the choice to the document. EWrongUsage for a root that the file does not have.
-	void CreateTarget(const std::string& i_rPath, const std::string& i_rRoot);
+	/// Reads the FBX file and makes the target subject of it, from the root bone of this name or index on; without one
+	/// the choice is the document's. EWrongUsage for a root that the file does not have.
+	void CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot);
 
 	/// EBadOutput if the file could not be written; the one that stood there then stays. "-" is standard output.
 	void Save(const std::string& i_rPath);
@@ -69,8 +70,11 @@ private:
 /// kinematics.
 std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectValues& i_rValues, const char* i_pWhich);
 
-/// Tells if the segments stand elsewhere than the bones of the file, with the worst bone in mm and degrees.
-/// @param i_pWhat begins the message, i_pHint ends it.
-void TellDifferenceFromFile(VSession& io_rSession, int i_Level, const char* i_pWhat, const char* i_pHint);
+/// The segment that stands farthest from its bone in the file; nothing if all stand where their bones do.
+std::optional<RetargetSetup::VPoseDifference> DifferenceFromFile(VSession& io_rSession);
+
+/// Logs "i_pWhat differs from the pose in the file", with the worst bone in mm and degrees, and i_pHint behind it.
+void TellDifferenceFromFile(VSession& io_rSession, const RetargetSetup::VPoseDifference& i_rWorst, int i_Level,
+    const char* i_pWhat, const char* i_pHint);
 
 } // namespace CommandLine

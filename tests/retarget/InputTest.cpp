@@ -1,0 +1,132 @@
+#include "Rows.h"
+
+namespace
+{
+
+const std::string c_Fbx = Data("fbx/own_ns_yup_cm_b7400.fbx");
+const std::string c_Performer = Data("qrt/performer.qrs");
+
+std::string Replaced(std::string i_Text, const std::string& i_rFrom, const std::string& i_rTo)
+{
+	return i_Text.replace(i_Text.find(i_rFrom), i_rFrom.size(), i_rTo);
+}
+
+std::string FileText(const std::string& i_rPath)
+{
+	const VScratchFolder folder;
+	std::filesystem::copy(i_rPath, folder / "copy");
+	return folder.Read("copy");
+}
+
+/// What a reader can meet at each entrance: the same files for every command that reads.
+class Input : public testing::Test
+{
+protected:
+	Input()
+	{
+		const std::string performer = FileText(c_Performer);
+		m_Folder.Write("empty", "");
+		m_Folder.Write("wrong.qrs", "<Skeleton/>");
+		m_Folder.Write("new.qrs", Replaced(performer, "VERSION=\"3.5\"", "VERSION=\"3.6\""));
+		m_Folder.Write("cut.qrs", performer.substr(0, performer.size() / 2));
+		m_Folder.Write("text.qrs", "Once upon a time");
+		m_Folder.Write("cut.fbx", FileText(c_Fbx).substr(0, 70000));
+		m_Folder.Write("new.qrx", "[[1,0,2],\"QRX\"]{}");
+		m_Folder.Write("text.qrx", "Once upon a time");
+	}
+
+	VScratchFolder m_Folder;
+};
+
+TEST_F(Input, OfSkeletonFiles)
+{
+	struct VCase
+	{
+		const char* m_pFile;
+		const char* m_pMessage;
+	};
+	const std::vector<VCase> cases{
+	    {"nothing.qrs", "error QRTIO: Error opening file 'nothing.qrs' for reading"},
+	    {".", "error QRTIO: Error opening file '.' for reading"},
+	    {"empty", "error QRTIO: "},
+	    {"wrong.qrs", "error QRTIO: "},
+	    {"new.qrs", "error QRTIO: Cannot load QRT file with version 3.6, maximum supported version is 3.5"},
+	    {"cut.qrs", "error QRTIO: Failed to read file"},
+	    {"text.qrs", "error QRTIO: Failed to read file"},
+	    {"nothing.qrx", "error RetargetSetup: "},
+	    {"new.qrx", "error RetargetSetup: The legacy file 'new.qrx' is of a later version than 1.0.1"},
+	    {"text.qrx", "error RetargetSetup: 'text.qrx' is not a legacy subject file, or is damaged"},
+	};
+	std::vector<VRow> rows;
+	for (const VCase& rCase : cases)
+	{
+		const std::string file = rCase.m_pFile;
+		rows.push_back({rCase.m_pFile, {"dump", file}, 3, "", rCase.m_pMessage});
+		rows.push_back({rCase.m_pFile, {"fk", file}, 3, "", rCase.m_pMessage});
+		rows.push_back({rCase.m_pFile, {"targets", file}, 3, "", rCase.m_pMessage});
+		rows.push_back({rCase.m_pFile, {"convert", file, "x.qrs"}, 3, "", rCase.m_pMessage});
+		rows.push_back({rCase.m_pFile, {"edit", file, "-o", "x.qrr"}, 3, "", rCase.m_pMessage});
+	}
+	rows.push_back({"as source", {"create", "--fbx", c_Fbx, "--source", "cut.qrs", "-o", "x.qrr"}, 3, "",
+	    "error retarget: \"cut.qrs\" could not be read as a source skeleton"});
+	RunRows(rows, m_Folder);
+}
+
+TEST_F(Input, OfFbxFiles)
+{
+	RunRows(
+	    {
+	        {"missing", {"fbx", "nothing.fbx"}, 3, "", "error FBXIO: File nothing.fbx not found"},
+	        {"folder", {"fbx", "."}, 3, "", "error FBXIO: File . not found"},
+	        {"empty", {"fbx", "empty"}, 3, "", "error FBXIO: Call to KFbxImporter::Initialize() failed."},
+	        {"other", {"fbx", "wrong.qrs"}, 3, "", "error FBXIO: Call to KFbxImporter::Initialize() failed."},
+	        {"cut", {"fbx", "cut.fbx"}, 3, "\"upAxis\": 1",
+	            "\"cut.fbx\" was read only in part; what was read is shown"},
+	        {"create, missing", {"create", "--fbx", "nothing.fbx", "-o", "x.qrr"}, 3, "", "File nothing.fbx not found"},
+	        {"create, cut", {"create", "--fbx", "cut.fbx", "-o", "x.qrr"}, 3, "",
+	            "error retarget: \"cut.fbx\" could be read only in part"},
+	        {"create, no bones", {"create", "--fbx", Data("fbx/ufbx_maya_pivot_offset_7700_ascii.fbx"), "-o", "x.qrr"},
+	            3, "", "could not be read as FBX, or holds no skeleton"},
+	    },
+	    m_Folder);
+}
+
+TEST_F(Input, OutputThatCannotBeWritten)
+{
+	RunRows(
+	    {
+	        {"no folder", {"create", "--fbx", c_Fbx, "-o", "no/x.qrr"}, 4, "",
+	            "error QRTIO: Error opening file 'no/x.qrr' for writing"},
+	        {"a folder", {"convert", c_Performer, "."}, 4, "", "error retarget: \".\" could not be written"},
+	        {"schema", {"schema", "-o", "no/x.xsd"}, 4, "", "error retarget: \"no/x.xsd\" could not be written"},
+	    },
+	    m_Folder);
+}
+
+/// The file that is replaced is the one that was read, and a failure half-way leaves it.
+TEST_F(Input, AFailedEditLeavesTheFileAlone)
+{
+	ASSERT_EQ(RunRetarget({"create", "--fbx", c_Fbx, "-o", "x.qrr"}, m_Folder.Path()).m_Status, 0);
+	const std::string before = m_Folder.Read("x.qrr");
+	EXPECT_EQ(
+	    RunRetarget({"edit", "x.qrr", "--scale", "2", "--pose", "No=1,2,3", "-o", "x.qrr"}, m_Folder.Path()).m_Status,
+	    2);
+	EXPECT_EQ(m_Folder.Read("x.qrr"), before);
+	EXPECT_EQ(RunRetarget({"edit", "x.qrr", "--scale", "2", "-o", "x.qrr"}, m_Folder.Path()).m_Status, 0);
+	EXPECT_NE(m_Folder.Read("x.qrr"), before);
+	EXPECT_EQ(RunRetarget({"edit", "x.qrr", "--scale", "1", "-o", "x.qrr"}, m_Folder.Path()).m_Status, 0);
+	EXPECT_EQ(m_Folder.Read("x.qrr"), before);
+}
+
+TEST(Output, StandardOutputThatIsFull)
+{
+	if (!std::filesystem::exists("/dev/full"))
+		GTEST_SKIP() << "no /dev/full here";
+	const VScratchFolder folder;
+	const std::string command =
+	    std::string(RETARGET_PROGRAM) + " schema > /dev/full 2> '" + (folder / "err").string() + "'";
+	EXPECT_EQ(std::system(command.c_str()) >> 8, 4);
+	EXPECT_NE(folder.Read("err").find("error retarget: Error writing to standard output"), std::string::npos);
+}
+
+} // namespace

@@ -1,0 +1,157 @@
+#include "Rows.h"
+
+#include <nlohmann/json.hpp>
+
+#include <cstdlib>
+
+namespace
+{
+
+const std::string c_Fbx = Data("fbx/own_ns_yup_cm_b7400.fbx");
+const std::string c_Performer = Data("qrt/performer.qrs");
+
+std::vector<std::string> Create(std::vector<std::string> i_Edits)
+{
+	std::vector<std::string> arguments{"create", "--fbx", c_Fbx, "--source", c_Performer, "-o", "x.qrr"};
+	arguments.insert(arguments.end(), i_Edits.begin(), i_Edits.end());
+	return arguments;
+}
+
+TEST(Usage, HelpAndVersion)
+{
+	const VScratchFolder folder;
+	RunRows(
+	    {
+	        {"help", {"--help"}, 0, "retarget create --fbx hero.fbx --source performer.qrs", ""},
+	        {"help of a command", {"create", "--help"}, 0, "--match-file-pose", ""},
+	        {"help as a word", {"help", "fk"}, 0, "bind|mean|tpose", ""},
+	        {"version", {"--version"}, 0, "retarget 0.", ""},
+	        {"nothing", {}, 2, "", "Usage: retarget COMMAND"},
+	        {"every help has examples", {"schema", "-h"}, 0, "Examples:\n  retarget schema", ""},
+	    },
+	    folder);
+}
+
+TEST(Usage, WrongWords)
+{
+	const VScratchFolder folder;
+	RunRows(
+	    {
+	        {"unknown command", {"creat", "--fbx", "x"}, 2, "",
+	            "error retarget: there is no command \"creat\"; did you mean \"create\"?; see \"retarget --help\"\n"},
+	        {"unknown option", {"dump", "--evaluatd", "x"}, 2, "",
+	            "error retarget: there is no option \"--evaluatd\"; did you mean \"--evaluated\"?"},
+	        {"option of another command", {"edit", "x", "--match-file-pose", "-o", "y"}, 2, "", "--match-file-pose"},
+	        {"not offered", {"check", "x"}, 2, "", "there is no command \"check\""},
+	        {"too many", {"dump", "x", "y"}, 2, "", "error retarget: \"y\" is one argument too many; see"},
+	        {"missing file", {"dump"}, 2, "", "error retarget: FILE is required; see \"retarget dump --help\""},
+	        {"missing output", {"create", "--fbx", c_Fbx}, 2, "", "--output is required"},
+	        {"missing value", {"create", "--fbx"}, 2, "", "--fbx"},
+	        {"level", {"--log", "FBXIO=loud", "schema"}, 2, "", "\"FBXIO=loud\" is not CATEGORY=LEVEL"},
+	        {"context", {"eval", "1", "--context", "cubic"}, 2, "", "cubic not in {static,linear,full}"},
+	        {"pose", {"fk", c_Performer, "--pose", "rest"}, 2, "", "rest not in {bind,mean,tpose}"},
+	        {"version", {"convert", c_Performer, "x.qrs", "--format-version", "3.6"}, 2, "",
+	            "the format has no version \"3.6\", only 1.0 1.5 2.0"},
+	        {"state", {"fk", c_Performer, "--state", "1,2"}, 2, "", "take 67 numbers, not 2"},
+	    },
+	    folder);
+}
+
+TEST(Usage, EditsThatNameWhatIsNotThere)
+{
+	const VScratchFolder folder;
+	RunRows(
+	    {
+	        {"source name", Create({"--position", "Hisp:Hips"}), 2, "",
+	            "error retarget: there is no source segment \"Hisp\"; did you mean \"Hips\", "},
+	        {"target name", Create({"--rotation", "Hips:pelvis"}), 2, "",
+	            "there is no target segment \"pelvis\"; did you mean "},
+	        {"second edit", Create({"--rotation", "Hips:Hips", "--rotation", "Head:Haed"}), 2, "",
+	            "there is no target segment \"Haed\"; did you mean \"Head\", "},
+	        {"index", Create({"--position", "#31:#0"}), 2, "",
+	            "there is no source segment #31; they go from #0 to #30, the last is \"RThumb\""},
+	        {"no pair", Create({"--position", "Hips"}), 2, "", "\"Hips\" is not SOURCE:TARGET"},
+	        {"no source", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--position", "Hips:Hips"}, 2, "",
+	            "--position needs the performer's skeleton: give it with --source FILE.qrs"},
+	        {"no source to update", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--update-targets"}, 2, "",
+	            "--update-targets needs the performer's skeleton"},
+	        {"no targets", Create({"--remove-target", "0"}), 2, "", "there is no target #0; there is no target at all"},
+	        {"target index", Create({"--position", "Hips:Hips", "--weight", "1=2"}), 2, "",
+	            "there is no target #1; they go from #0 to #0"},
+	        {"root name", Create({"--root", "Hip"}), 2, "", "there is no bone \"Hip\"; did you mean \"Hips\""},
+	        {"root index", Create({"--root", "34"}), 2, "", "there is no bone #34; they go from #0 to #33"},
+	        {"empty root", Create({"--root", ""}), 2, "", "there is no bone \"\""},
+	    },
+	    folder);
+}
+
+TEST(Usage, EditsWithUnfitValues)
+{
+	const VScratchFolder folder;
+	RunRows(
+	    {
+	        {"scale 0", Create({"--scale", "0"}), 2, "", "--scale: a scale must be above 0: 0"},
+	        {"scale -1", Create({"--scale", "-1"}), 2, "", "--scale: a scale must be above 0: -1"},
+	        {"scale nan", Create({"--scale", "nan"}), 2, "", "--scale: \"nan\" is not a finite number"},
+	        {"scale overflow", Create({"--scale", "1e999"}), 2, "", "--scale: \"1e999\" is not a finite number"},
+	        {"scale word", Create({"--scale", "big"}), 2, "", "--scale: \"big\" is not a finite number"},
+	        {"scale in German", Create({"--scale", "1,5"}), 2, "", "--scale: \"1,5\" is not a finite number"},
+	        {"weight", Create({"--position", "Hips:Hips", "--weight", "0=-1"}), 2, "",
+	            "a weight cannot be negative: -1"},
+	        {"weight form", Create({"--position", "Hips:Hips", "--weight", "0"}), 2, "", "\"0\" is not TARGET=WEIGHT"},
+	        {"state count", Create({"--position", "Hips:Hips", "--state", "0=1,2"}), 2, "",
+	            "--state: \"1,2\" is not three numbers"},
+	        {"state word", Create({"--position", "Hips:Hips", "--state", "0=1,2,x"}), 2, "",
+	            "--state: \"x\" is not a finite number"},
+	        {"pose count", Create({"--pose", "LeftArm=1,2"}), 2, "", "the joint of \"LeftArm\" takes 3 numbers, not 2"},
+	        {"pose of the root", Create({"--pose", "Hips=1,2,3,4"}), 2, "", "takes 3 or 6 numbers, not 4"},
+	        {"pose without joint", Create({"--prune-joints", "--pose", "LeftArm=1,2,3"}), 2, "",
+	            "--pose: \"LeftArm\" has no joint that could move"},
+	        {"pose of nothing", Create({"--pose", "Lefty=1,2,3"}), 2, "", "there is no target segment \"Lefty\""},
+	    },
+	    folder);
+}
+
+TEST(Usage, LevelsOfMessages)
+{
+	const VScratchFolder folder;
+	const auto messages = [&](std::vector<std::string> i_Options)
+	{
+		std::vector<std::string> arguments{"create", "--fbx", Data("fbx/kenney_medium_b7400.fbx"), "-o", "x.qrr"};
+		arguments.insert(arguments.begin(), i_Options.begin(), i_Options.end());
+		return RunRetarget(arguments, folder.Path()).m_Err;
+	};
+	const std::string warning = "warning RetargetSetup: The file has 3 root bones";
+	EXPECT_EQ(messages({}).rfind(warning, 0), 0u);
+	EXPECT_EQ(messages({"-q"}), "");
+	EXPECT_NE(messages({"-v"}).find("information FBXIO: Loading file"), std::string::npos);
+	EXPECT_EQ(messages({"-v", "RetargetSetup=error"}), "");
+	EXPECT_EQ(messages({"--log=RetargetSetup=error", "-v"}).rfind("information FBXIO", 0), 0u);
+}
+
+TEST(Usage, CompletionKnowsTheOptionTable)
+{
+	const VScratchFolder folder;
+	const VRun completion = RunRetarget({"documentation", "bash"}, folder.Path());
+	ASSERT_EQ(completion.m_Status, 0);
+	folder.Write("script",
+	    completion.m_Out
+	        + "\nask() { COMP_WORDS=(\"$@\"); COMP_CWORD=$(($#-1)); _retarget; echo \"${COMPREPLY[*]}\"; }\n"
+	          "ask retarget cr; ask retarget -q ed; ask retarget create --up; ask retarget fk x --pose m\n");
+	EXPECT_EQ(
+	    std::system(("bash '" + (folder / "script").string() + "' > '" + (folder / "out").string() + "'").c_str()), 0);
+	EXPECT_EQ(folder.Read("out"), "create\nedit\n--update-targets\n\n");
+}
+
+TEST(Usage, ManualTellsAllCommands)
+{
+	const VScratchFolder folder;
+	const VRun manual = RunRetarget({"documentation", "man"}, folder.Path());
+	ASSERT_EQ(manual.m_Status, 0);
+	EXPECT_EQ(manual.m_Out.rfind(".TH RETARGET 1", 0), 0u);
+	for (const char* pText : {".SS retarget create\n", ".SS retarget eval\n", "\\-\\-match\\-file\\-pose\n"})
+		EXPECT_NE(manual.m_Out.find(pText), std::string::npos) << pText;
+	EXPECT_EQ(manual.m_Out.find("documentation"), std::string::npos) << "a hidden command";
+}
+
+} // namespace
