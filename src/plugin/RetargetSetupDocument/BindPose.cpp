@@ -19,11 +19,24 @@ namespace RetargetSetup
 namespace
 {
 
-/// A target that fits no class must not keep the segments from being measured.
-VSubject WithoutTargets(const VSubject& i_rSubject)
+/// What the kinematics of segments is made of: no statistics and names, whose copies would cost more than the rest, and
+/// no targets, of which one that fits no class would keep the segments from being measured.
+VSubject BareSegments(const VSubject& i_rSubject)
 {
 	VSubject subject;
-	subject.m_Segments = i_rSubject.m_Segments;
+	subject.m_Segments.resize(i_rSubject.m_Segments.size());
+	for (std::size_t i = 0; i < subject.m_Segments.size(); ++i)
+	{
+		const VSubject::VSegment& rFrom = i_rSubject.m_Segments[i];
+		VSubject::VSegment& rTo = subject.m_Segments[i];
+		rTo.m_ParentSegmentIndex = rFrom.m_ParentSegmentIndex;
+		rTo.m_PreRotation = rFrom.m_PreRotation;
+		rTo.m_PreTranslation = rFrom.m_PreTranslation;
+		rTo.m_InversePostRotation = rFrom.m_InversePostRotation;
+		rTo.m_InversePostTranslation = rFrom.m_InversePostTranslation;
+		rTo.m_Joint.m_JointType = rFrom.m_Joint.m_JointType;
+		rTo.m_Joint.m_JointOrientation = rFrom.m_Joint.m_JointOrientation;
+	}
 	return subject;
 }
 
@@ -42,7 +55,7 @@ std::unique_ptr<VComputeSubjectFK> KinematicsInBindPose(
 {
 	try
 	{
-		auto pFK = std::make_unique<VComputeSubjectFK>(WithoutTargets(i_rSubject));
+		auto pFK = std::make_unique<VComputeSubjectFK>(BareSegments(i_rSubject));
 		const std::vector<double> state =
 		    CoreOrlexTypesUtils::PoseVector(i_rParametrised, &VSubjectParametrised::VJoint::m_BindPose);
 		if (pFK->NumberOfSegments() > 0 && pFK->NumberOfSegments() == i_rParametrised.m_Segments.size()
