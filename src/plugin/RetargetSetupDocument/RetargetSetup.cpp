@@ -1,5 +1,6 @@
 #include "RetargetSetupDocument/RetargetSetup.h"
 
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/GlobalScale.h"

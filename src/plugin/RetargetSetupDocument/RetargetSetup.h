@@ -20,6 +20,11 @@
 #include <memory>
 #include <string>
 
+namespace ComputeSubject
+{
+class VComputeSubjectFK;
+}
+
 /// The document of the panel: the source subject (the performer's skeleton, which is only read), the target subject
 /// (the character's, which is edited and saved) and the FBX skeleton that a target subject is made from.
 ///
@@ -155,6 +160,9 @@ private:
 		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pParametrised;
 	};
 
+	/// The source subject at rest in its bind pose; null if it has none. Kept until the source subject is another one.
+	const ComputeSubject::VComputeSubjectFK* SourceKinematics();
+
 	static VSubjectValues ValuesOf(const VSubjectItems& i_rItems);
 
 	/// Replaces the items of one subject and publishes.
@@ -189,6 +197,8 @@ private:
 	bool m_bJointSymmetry = true;
 	NVX::VSignal<> m_ChangedSignal;
 
+	std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pSourceFK;
+	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubjectOfSourceFK;
 	CoreOrlexQRTIO::VSubjectQRTExtras m_TargetExtras;
 	bool m_bTargetFBXComplete = true;
 	/// The root bone was chosen since the FBX file was read.

@@ -21,22 +21,12 @@ using RetargetSetup::c_LogCategory;
 namespace
 {
 
-/// Both subjects at rest in their bind poses.
-struct VPrepared
+/// Null without the values that a command on both subjects needs, and if they are no tree.
+std::unique_ptr<VComputeSubjectFK> TargetKinematics(const VRetargetSetup::VSubjectValues& i_rTarget)
 {
-	std::unique_ptr<VComputeSubjectFK> m_pSourceFK;
-	std::unique_ptr<VComputeSubjectFK> m_pTargetFK;
-
-	explicit operator bool() const { return m_pSourceFK && m_pTargetFK; }
-};
-
-VPrepared Prepare(const VRetargetSetup::VSubjectValues& i_rSource, const VRetargetSetup::VSubjectValues& i_rTarget)
-{
-	if (!i_rTarget.m_pParametrised || !i_rTarget.m_pApplicationData || !i_rTarget.m_pSubject
-	    || !i_rSource.m_pParametrised || !i_rSource.m_pSubject)
-		return {};
-	return {RetargetSetup::KinematicsInBindPose(*i_rSource.m_pParametrised, *i_rSource.m_pSubject, "source"),
-	    RetargetSetup::KinematicsInBindPose(*i_rTarget.m_pParametrised, *i_rTarget.m_pSubject, "target")};
+	if (!i_rTarget.m_pParametrised || !i_rTarget.m_pApplicationData || !i_rTarget.m_pSubject)
+		return nullptr;
+	return RetargetSetup::KinematicsInBindPose(*i_rTarget.m_pParametrised, *i_rTarget.m_pSubject, "target");
 }
 
 void TellNoPartner(const VSubjectParametrised& i_rSubject, std::size_t i_SegmentIndex, const char* i_pWhich)
@@ -64,6 +54,22 @@ void TellChangedPose(const VComputeSubjectFK& i_rBefore, const VSubjectParametri
 
 } // namespace
 
+const VComputeSubjectFK* VRetargetSetup::SourceKinematics()
+{
+	const VSubjectValues source = SourceValues();
+	if (source.m_pSubject != m_pSubjectOfSourceFK)
+	{
+		m_pSourceFK.reset();
+		m_pSubjectOfSourceFK.reset();
+	}
+	if (!m_pSourceFK && source.m_pParametrised && source.m_pSubject)
+	{
+		m_pSourceFK = RetargetSetup::KinematicsInBindPose(*source.m_pParametrised, *source.m_pSubject, "source");
+		m_pSubjectOfSourceFK = source.m_pSubject;
+	}
+	return m_pSourceFK.get();
+}
+
 void VRetargetSetup::AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry)
 {
 	const VSubjectValues source = SourceValues();
@@ -73,16 +79,17 @@ void VRetargetSetup::AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentInde
 	if (!source.m_pParametrised || sourceIndex >= source.m_pParametrised->m_Segments.size() || !target.m_pParametrised
 	    || targetIndex >= target.m_pParametrised->m_Segments.size())
 		return;
-	const VPrepared prepared = Prepare(source, target);
-	if (!prepared)
+	const VComputeSubjectFK* const pSourceFK = SourceKinematics();
+	const auto pTargetFK = TargetKinematics(target);
+	if (!pSourceFK || !pTargetFK)
 		return;
 
 	VSubjectParametrised subject = *target.m_pParametrised;
 	VSubjectApplicationData applicationData = *target.m_pApplicationData;
 	const auto addPair = [&](std::size_t i_Source, std::size_t i_Target)
 	{
-		RetargetSetup::AddTargetPair(*prepared.m_pSourceFK, *prepared.m_pTargetFK, i_Source, i_Target, i_bPosition,
-		    *source.m_pParametrised, subject, applicationData);
+		RetargetSetup::AddTargetPair(
+		    *pSourceFK, *pTargetFK, i_Source, i_Target, i_bPosition, *source.m_pParametrised, subject, applicationData);
 	};
 	addPair(sourceIndex, targetIndex);
 	if (i_bSymmetry)
@@ -115,11 +122,12 @@ void VRetargetSetup::UpdateTargets()
 {
 	const VSubjectValues source = SourceValues();
 	const VSubjectValues target = TargetValues();
-	const VPrepared prepared = Prepare(source, target);
-	if (!prepared)
+	const VComputeSubjectFK* const pSourceFK = SourceKinematics();
+	const auto pTargetFK = TargetKinematics(target);
+	if (!pSourceFK || !pTargetFK)
 		return;
 	VSubjectParametrised subject = *target.m_pParametrised;
-	RetargetSetup::UpdateTargetStates(*prepared.m_pSourceFK, *prepared.m_pTargetFK, *source.m_pParametrised, subject);
+	RetargetSetup::UpdateTargetStates(*pSourceFK, *pTargetFK, *source.m_pParametrised, subject);
 	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)), target.m_pApplicationData);
 }
 
