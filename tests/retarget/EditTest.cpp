@@ -1,0 +1,230 @@
+#include "Rows.h"
+
+#include <nlohmann/json.hpp>
+
+#include <cmath>
+#include <fstream>
+
+namespace
+{
+
+using VJson = nlohmann::json;
+
+const std::string c_Fbx = Data("fbx/own_ns_yup_cm_b7400.fbx");
+const std::string c_Performer = Data("qrt/performer.qrs");
+
+VJson RunJson(const std::vector<std::string>& i_rArguments, const VScratchFolder& i_rFolder)
+{
+	const VRun run = RunRetarget(i_rArguments, i_rFolder.Path());
+	EXPECT_EQ(run.m_Status, 0) << run.m_Err;
+	return VJson::parse(run.m_Out, nullptr, false);
+}
+
+/// Creates x.qrr with these edits.
+class Edit : public testing::Test
+{
+protected:
+	VRun Create(std::vector<std::string> i_Edits, const std::string& i_rFbx = c_Fbx)
+	{
+		std::vector<std::string> arguments{"create", "--fbx", i_rFbx, "--source", c_Performer, "-o", "x.qrr"};
+		arguments.insert(arguments.end(), i_Edits.begin(), i_Edits.end());
+		VRun run = RunRetarget(arguments, m_Folder.Path());
+		EXPECT_EQ(run.m_Status, 0) << run.m_Err;
+		return run;
+	}
+
+	VJson Targets() { return RunJson({"targets", "x.qrr", "--source", c_Performer, "--json"}, m_Folder); }
+	VJson Subject() { return RunJson({"dump", "x.qrr"}, m_Folder).at("SubjectParametrised"); }
+
+	std::vector<std::string> Names()
+	{
+		std::vector<std::string> names;
+		for (const VJson& rTarget : Targets())
+			names.push_back(rTarget.at("name"));
+		return names;
+	}
+
+	VScratchFolder m_Folder;
+};
+
+using VNames = std::vector<std::string>;
+
+TEST_F(Edit, RunInTheOrderOfTheLine)
+{
+	Create({"--rotation", "LeftArm:LeftArm", "--symmetry", "--position", "LeftFoot:LeftFoot", "--no-symmetry",
+	    "--rotation", "LeftLeg:LeftLeg", "--position", "#0:#0"});
+	EXPECT_EQ(Names(),
+	    (VNames{"LeftArm}LeftArm", "LeftFoot>LeftFoot", "RightFoot>RightFoot", "LeftLeg}LeftLeg", "Hips>Hips"}));
+	Create({"--position", "Hips:Hips", "--rotation", "Head:Head", "--remove-target", "0", "--weight", "0=2.5",
+	    "--position", "Neck:Neck"});
+	EXPECT_EQ(Names(), (VNames{"Head}Head", "Neck>Neck"}));
+	EXPECT_EQ(Targets()[0].at("weight"), 2.5);
+
+	// The performer's hips stand 20 mm from the character's; lengths are stored over the scale of the moment.
+	Create({"--position", "Hips:Hips", "--scale", "2"});
+	EXPECT_EQ(
+	    Targets()[0].at("state"), VJson({"0.000000*GlobalScale", "20.000000*GlobalScale", "0.000043*GlobalScale"}));
+	EXPECT_NEAR(Targets()[0].at("distance"), 20.0, 1e-3) << "twice the offset";
+	Create({"--scale", "2", "--position", "Hips:Hips"});
+	EXPECT_EQ(
+	    Targets()[0].at("state"), VJson({"0.000000*GlobalScale", "10.000000*GlobalScale", "0.000021*GlobalScale"}));
+	EXPECT_NEAR(Targets()[0].at("distance"), 0.0, 1e-5);
+}
+
+TEST_F(Edit, StatesAreTakenAtThePresentScale)
+{
+	Create({"--scale", "4", "--position", "Hips:Hips", "--rotation", "Hips:Hips", "--state", "0=4,-8,1e1", "--state",
+	    "1=0.5,0,-1"});
+	const VJson targets = Targets();
+	EXPECT_EQ(targets[0].at("state"), VJson({"1.000000*GlobalScale", "-2.000000*GlobalScale", "2.500000*GlobalScale"}));
+	EXPECT_EQ(targets[1].at("state"), VJson({"0.5", "0", "-1"}));
+	EXPECT_EQ(targets[1].at("type"), "LocalRotationToWorldRotation");
+	EXPECT_EQ(targets[1].at("source"), "Hips");
+	EXPECT_TRUE(targets[1].at("distance").is_null());
+}
+
+TEST_F(Edit, ResidualsFollowThePoseUntilTheTargetsAreUpdated)
+{
+	Create({"--rotation", "Spine:Spine", "--position", "Head:Head"});
+	const VJson pose = Subject().at("Segments")[1].at("Joint").at("BindPose");
+	ASSERT_EQ(pose, VJson({0.0, 0.0, 0.0})) << "a bone at rest";
+	const std::vector<std::string> edit{
+	    "edit", "x.qrr", "--source", c_Performer, "--pose", "Spine=0.5,0,0", "-o", "x.qrr"};
+	EXPECT_EQ(RunRetarget(edit, m_Folder.Path()).m_Status, 0);
+	EXPECT_NEAR(Targets()[0].at("angle"), 0.5 * 180.0 / M_PI, 1e-9);
+	EXPECT_GT(Targets()[1].at("distance"), 50.0);
+	const VJson joint = Subject().at("Segments")[1].at("Joint");
+	EXPECT_EQ(joint.at("BindPose"), VJson({0.5, 0.0, 0.0}));
+	EXPECT_EQ(joint.at("Mean"), joint.at("BindPose"));
+	EXPECT_EQ(
+	    RunRetarget({"edit", "x.qrr", "--source", c_Performer, "--update-targets", "-o", "x.qrr"}, m_Folder.Path())
+	        .m_Status,
+	    0);
+	EXPECT_NEAR(Targets()[0].at("angle"), 0.0, 1e-9);
+	EXPECT_NEAR(Targets()[1].at("distance"), 0.0, 1e-5);
+}
+
+TEST_F(Edit, APoseOfTheRootsRotationLeavesItsPlace)
+{
+	Create({});
+	const VJson before = Subject().at("Segments")[0].at("Joint").at("BindPose");
+	Create({"--pose", "Hips=0.1,0.2,0.3"});
+	const VJson after = Subject().at("Segments")[0].at("Joint").at("BindPose");
+	EXPECT_EQ(VJson({after[0], after[1], after[2]}), VJson({0.1, 0.2, 0.3}));
+	EXPECT_EQ(VJson({after[3], after[4], after[5]}), VJson({before[3], before[4], before[5]}));
+}
+
+TEST_F(Edit, PruningAndCreatingJoints)
+{
+	const auto types = [&]
+	{
+		std::map<std::string, int> counts;
+		const VJson subject = Subject();
+		for (const VJson& rSegment : subject.at("Segments"))
+			++counts[rSegment.at("Joint").at("JointType").get<std::string>()];
+		return counts;
+	};
+	Create({"--rotation", "Head:Head", "--prune-joints"});
+	EXPECT_EQ(types(), (std::map<std::string, int>{{"Free", 1}, {"Ball", 1}, {"Dummy", 32}}));
+	Create({"--prune-joints", "--create-joints"});
+	EXPECT_EQ(types(), (std::map<std::string, int>{{"Free", 1}, {"Ball", 33}}));
+}
+
+TEST_F(Edit, WhatSurprisesIsTold)
+{
+	EXPECT_NE(Create({"--symmetry", "--rotation", "Spine:Spine"}).m_Err.find("has no partner on the other side"),
+	    std::string::npos);
+	EXPECT_NE(Create({"--match-file-pose", "--prune-joints"}).m_Err.find("pruning moves what was matched"),
+	    std::string::npos);
+	const std::string arnaud = Data("fbx/pab_arnaud_b7500.fbx");
+	const VRun built = Create({}, arnaud);
+	EXPECT_NE(built.m_Err.find("Root bone 'Hips' has a pre-rotation"), std::string::npos) << built.m_Err;
+	EXPECT_NE(built.m_Err.find("warning retarget: The bind pose as built differs from the pose in the file, at worst "
+	                           "\"Head\" by 2333.4 mm and 90.0 degrees; --match-file-pose mends it\n"),
+	    std::string::npos)
+	    << built.m_Err;
+	EXPECT_EQ(Create({"--match-file-pose"}, arnaud).m_Err.find("as built"), std::string::npos);
+
+	const VRun other =
+	    RunRetarget({"edit", "x.qrr", "--source", Data("../../demo/performer.qrs"), "-o", "y.qrr"}, m_Folder.Path());
+	EXPECT_EQ(other.m_Err.find("made for the source"), std::string::npos) << "of the same name";
+	std::filesystem::copy(c_Performer, m_Folder / "other.qrs");
+	EXPECT_NE(RunRetarget({"targets", "x.qrr", "--source", "other.qrs"}, m_Folder.Path())
+	              .m_Err.find("The retarget subject was made for the source \"performer\", not for \"other\""),
+	    std::string::npos);
+}
+
+TEST_F(Edit, ToStandardOutput)
+{
+	Create({"--rotation", "Head:Head"});
+	const VRun run = RunRetarget({"edit", "x.qrr", "-o", "-"}, m_Folder.Path());
+	EXPECT_EQ(run.m_Status, 0);
+	EXPECT_EQ(run.m_Out, m_Folder.Read("x.qrr"));
+	const VRun table = RunRetarget({"-q", "targets", "x.qrr"}, m_Folder.Path());
+	EXPECT_EQ(table.m_Out.substr(0, table.m_Out.find('\n')),
+	    "INDEX  NAME       TYPE                          SOURCE  TARGET  WEIGHT  STATE");
+	EXPECT_NE(table.m_Out.find("\n    0  Head}Head  LocalRotationToWorldRotation  Head    Head         1  "),
+	    std::string::npos)
+	    << table.m_Out;
+}
+
+/// After --match-file-pose every segment stands where an independent reader found its bone, turned to Z up, with
+/// distances from the root times the scale.
+TEST_F(Edit, MatchFilePoseOnRealCharacters)
+{
+	struct VCharacter
+	{
+		const char* m_pFile;
+		const char* m_pRoot;
+		std::size_t m_First;
+		const char* m_pScale;
+	};
+	for (const VCharacter& rCharacter : {VCharacter{"heaps_biped_zup_a7100", "Bip001", 0, "1.0"},
+	         VCharacter{"kenney_medium_b7400", "HipsCtrl", 18, "1.0"},
+	         VCharacter{"own_game_zup_m_b7400", "pelvis", 0, "1.0"},
+	         VCharacter{"own_ns_yup_cm_a7400", "Hips", 0, "1.0"}, VCharacter{"own_ns_yup_cm_b7400", "#1", 1, "0.5"},
+	         VCharacter{"pab_arnaud_b7500", "Hips", 0, "1.0"}, VCharacter{"pab_arnaud_b7500", "Hips", 0, "1.7"},
+	         VCharacter{"ufbx_maya_human_ik_7400_binary", "0", 0, "1.0"}})
+	{
+		SCOPED_TRACE(rCharacter.m_pFile);
+		Create({"--root", rCharacter.m_pRoot, "--scale", rCharacter.m_pScale, "--rotation", "Head:#3", "--prune-joints",
+		           "--match-file-pose"},
+		    Data(std::string("fbx/") + rCharacter.m_pFile + ".fbx"));
+		const VJson segments = RunJson({"fk", "x.qrr"}, m_Folder).at("segments");
+		std::ifstream stream(Data(std::string("fbx/reference/") + rCharacter.m_pFile + ".json"));
+		const VJson reference = VJson::parse(stream);
+		const double scale = rCharacter.m_pScale[0] - '0' + (rCharacter.m_pScale[2] - '0') / 10.0;
+		const bool bYUp = reference.at("upAxis") == 1;
+
+		// Rows of the bone's matrix in the Z-up space: y becomes z, and z becomes -y.
+		const auto row = [&](const VJson& i_rMatrix, int i_Row, int i_Column) -> double
+		{
+			if (!bYUp || i_Row == 0)
+				return i_rMatrix[i_Row * 4 + i_Column];
+			return i_Row == 2 ? i_rMatrix[4 + i_Column].get<double>() : -i_rMatrix[8 + i_Column].get<double>();
+		};
+		const VJson& rRoot = reference.at("bones")[rCharacter.m_First].at("global");
+		ASSERT_GT(segments.size(), 20u);
+		for (std::size_t i = 0; i < segments.size(); ++i)
+		{
+			const VJson& rBone = reference["bones"][rCharacter.m_First + i];
+			SCOPED_TRACE(rBone.at("name"));
+			const VJson& rMatrix = rBone.at("global");
+			double lengths[3];
+			for (int column = 0; column < 3; ++column)
+				lengths[column] = std::hypot(row(rMatrix, 0, column), row(rMatrix, 1, column), row(rMatrix, 2, column));
+			for (int r = 0; r < 3; ++r)
+			{
+				const double position = row(rRoot, r, 3) + scale * (row(rMatrix, r, 3) - row(rRoot, r, 3));
+				EXPECT_NEAR(segments[i].at("translation")[r], position, 0.15) << r;
+				// Two columns: the third tells a mirrored bone, which no segment can be.
+				for (int column = 0; column < 2; ++column)
+					EXPECT_NEAR(
+					    segments[i].at("rotation")[r * 3 + column], row(rMatrix, r, column) / lengths[column], 1e-4)
+					    << r << column;
+			}
+		}
+	}
+}
+
+} // namespace

@@ -1,0 +1,227 @@
+#include "Rows.h"
+
+#include <nlohmann/json.hpp>
+
+#include <cmath>
+#include <fstream>
+
+namespace
+{
+
+using VJson = nlohmann::json;
+
+const std::string c_Performer = Data("qrt/performer.qrs");
+
+VJson Result(const std::vector<std::string>& i_rArguments, const VScratchFolder& i_rFolder, int i_Status = 0)
+{
+	const VRun run = RunRetarget(i_rArguments, i_rFolder.Path());
+	EXPECT_EQ(run.m_Status, i_Status) << run.m_Err;
+	return VJson::parse(run.m_Out, nullptr, false);
+}
+
+void ExpectNear(const VJson& i_rActual, const std::vector<double>& i_rExpected, double i_Tolerance)
+{
+	ASSERT_EQ(i_rActual.size(), i_rExpected.size());
+	for (std::size_t i = 0; i < i_rExpected.size(); ++i)
+		EXPECT_NEAR(i_rActual[i].get<double>(), i_rExpected[i], i_Tolerance) << i;
+}
+
+TEST(Eval, Values)
+{
+	const VScratchFolder folder;
+	RunRows(
+	    {
+	        {"parameter", {"eval", "2*(Arm + 10)", "--static", "Arm=250"}, 0, "520\n", ""},
+	        {"17 digits", {"eval", "1/3"}, 0, "0.33333333333333331\n", ""},
+	        {"chain", {"eval", "sin(a)^2", "--static", "b=3", "--static", "a=b/2"}, 0, "0.99499624830022271\n", ""},
+	        {"minus first", {"eval", "--static", "Arm=1", "--", "-Arm"}, 0, "-1\n", ""},
+	        {"minus and digit", {"eval", "-2^2"}, 0, "4\n", ""},
+	        {"not finite", {"eval", "-1/0"}, 0, "-inf\n", ""},
+	        {"linear", {"eval", "--context", "linear", "12.5*GlobalScale", "--dynamic", "GlobalScale=0x2"}, 0, "25\n",
+	            ""},
+	        {"full", {"eval", "--context=full", "a^d", "--static", "a=2", "--dynamic", "d=3"}, 0, "8\n", ""},
+	        {"empty geometry", {"eval", "", "--context", "linear"}, 0, "0\n", ""},
+	    },
+	    folder);
+}
+
+TEST(Eval, DiagnosticsStandAlone)
+{
+	struct VCase
+	{
+		std::vector<std::string> m_Arguments;
+		const char* m_pMessage;
+	};
+	const VScratchFolder folder;
+	for (const VCase& rCase : std::vector<VCase>{
+	         {{""}, "Parse Error at column 1: Empty expression\n"},
+	         {{"   "}, "Parse Error at column 4: Empty expression\n"},
+	         {{"x+1"}, "Parse Error at column 2: ID \"x\" was referenced but never declared\n"},
+	         {{"d+1", "--dynamic", "d=1"}, "Parse Error at column 2: ID \"d\" was referenced but never declared\n"},
+	         {{"a^2", "--context", "linear", "--static", "a=1"},
+	             "Parse Error at column 4: Power operator invalid for arguments\n"},
+	         {{"1", "--static", "a=1", "--static", "a=2"},
+	             "Cannot add StaticParameter 'a', a StaticParameter with that name already exists.\n"},
+	         {{"1", "--static", "a=b", "--static", "b=2"},
+	             "Validation of StaticParameter 'a' expression 'b' failed, Parse Error at column 2: ID \"b\" was "
+	             "referenced but never declared.\n"},
+	     })
+	{
+		std::vector<std::string> arguments = rCase.m_Arguments;
+		arguments.insert(arguments.begin(), "eval");
+		const VRun run = RunRetarget(arguments, folder.Path());
+		EXPECT_EQ(run.m_Status, 3);
+		EXPECT_EQ(run.m_Out, "");
+		EXPECT_EQ(run.m_Err, rCase.m_pMessage);
+	}
+}
+
+/// What an independent reader found in each file.
+TEST(Fbx, AgreesWithTheReference)
+{
+	const VScratchFolder folder;
+	std::size_t files = 0;
+	for (const auto& rEntry : std::filesystem::directory_iterator(Data("fbx/reference")))
+	{
+		SCOPED_TRACE(rEntry.path().stem().string());
+		std::ifstream stream(rEntry.path());
+		const VJson expected = VJson::parse(stream);
+		const VJson actual = Result({"fbx", Data("fbx/" + rEntry.path().stem().string() + ".fbx")}, folder);
+		EXPECT_EQ(actual.at("upAxis"), expected.at("upAxis"));
+		EXPECT_EQ(actual.at("unitScale"), expected.at("unitScale"));
+		ASSERT_EQ(actual.at("bones").size(), expected.at("bones").size());
+		for (std::size_t i = 0; i < expected["bones"].size(); ++i)
+		{
+			const VJson& rExpected = expected["bones"][i];
+			const VJson& rActual = actual["bones"][i];
+			SCOPED_TRACE(rExpected.at("name"));
+			EXPECT_EQ(rActual.at("name"), rExpected.at("name"));
+			EXPECT_EQ(rActual.at("parent"), rExpected.at("parent"));
+			EXPECT_NEAR(rActual.at("accumulatedScale"), rExpected.at("accumulatedScale").get<double>(), 1e-4);
+			for (const char* pKey : {"preRotation", "local", "global"})
+			{
+				ASSERT_EQ(rActual.at(pKey).size(), 16u);
+				for (std::size_t k = 0; k < 16; ++k)
+				{
+					const double value = rExpected.at(pKey)[k];
+					const bool bTranslation = k % 4 == 3;
+					EXPECT_NEAR(rActual.at(pKey)[k].get<double>(), value,
+					    bTranslation ? std::max(0.01, 1e-5 * std::abs(value)) : 1e-4)
+					    << pKey << k;
+				}
+			}
+		}
+		++files;
+	}
+	EXPECT_EQ(files, 11u);
+}
+
+TEST(Dump, SpellsAsTheSchemaDoes)
+{
+	const VScratchFolder folder;
+	const VJson whole = Result({"dump", c_Performer}, folder);
+	const VJson& rSubject = whole.at("SubjectParametrised");
+	EXPECT_EQ(rSubject.at("Name"), "Template");
+	EXPECT_EQ(rSubject.at("SubjectId"), 0x0FFFFFFF);
+	ASSERT_EQ(rSubject.at("Segments").size(), 31u);
+	const VJson& rArm = rSubject["Segments"][2];
+	EXPECT_EQ(rArm.at("Name"), "LeftUpLeg");
+	EXPECT_EQ(rArm.at("ParentSegmentIndex"), 1);
+	EXPECT_EQ(rArm.at("Joint").at("JointType"), "Ball");
+	EXPECT_EQ(rSubject["Segments"][0]["ParentSegmentIndex"], 0xFFFFFFFF);
+	EXPECT_EQ(whole.at("SubjectApplicationData").at("Segments")[1].at("Colour"), VJson({0, 128, 255, 255}));
+	EXPECT_EQ(whole["SubjectApplicationData"]["Segments"][0]["DrawStyle"], "DrawStyleTetraStripe");
+
+	const VJson evaluated = Result({"dump", "--evaluated", c_Performer}, folder);
+	EXPECT_EQ(evaluated.size(), 1u);
+	ExpectNear(evaluated.at("Subject").at("Segments")[2].at("PreTranslation"), {76.9372, -47.3733, -101.2969}, 1e-9);
+	EXPECT_EQ(evaluated["Subject"]["Segments"][2]["Joint"]["JointType"], "Ball");
+}
+
+TEST(Dump, LegacyTextAsTheDocumentTakesItIn)
+{
+	const VScratchFolder folder;
+	folder.Write("old.qrx",
+	    "{\"Version\":[1,0,1],\"Schema\":\"Retarget\"}\n{\"SubjectParametrised\":{\"Name\":\"Hero\",\"Segments\":[{"
+	    "\"Name\":"
+	    "\"a\\\"b\",\"Joint\":{\"JointType\":\"Free\",\"TPoseMean\":[0,0,0,0,0,7]}}]}}");
+	const VRun run = RunRetarget({"dump", "old.qrx"}, folder.Path());
+	EXPECT_EQ(run.m_Status, 0);
+	EXPECT_NE(run.m_Err.find("warning RetargetSetup: Legacy file: the subject's name 'Hero' becomes 'Template'"),
+	    std::string::npos)
+	    << run.m_Err;
+	const VJson whole = VJson::parse(run.m_Out);
+	EXPECT_EQ(whole.at("SubjectParametrised").at("Name"), "Template");
+	EXPECT_EQ(whole["SubjectParametrised"]["Segments"][0]["Name"], "a\"b");
+	EXPECT_EQ(whole["SubjectParametrised"]["Segments"][0]["Joint"]["BindPose"], VJson({0.0, 0.0, 0.0, 0.0, 0.0, 7.0}));
+	EXPECT_EQ(whole["SubjectApplicationData"]["Segments"].size(), 1u) << "brought to the subject's length";
+}
+
+/// A root turned by 90 degrees about Z with a hinge about Z behind it: all poses are known without a computer.
+TEST(Fk, PosesOfAHandMadeArm)
+{
+	const VScratchFolder folder;
+	folder.Write(
+	    "arm.qrs", R"(<KinematicModel VERSION="3.5"><Parameters><StaticParameter NAME="Arm" VALUE="100"/></Parameters>
+<Skeleton><Segment NAME="root"><JointFree NAME="j0" PRE-ORIENTATION="0 0 0" PRE-POSITION="0 0 0">
+<JointTemplate BIND-POSE="0 0 1.5707963267948966 10 20 1000" PRE-ORIENTATION="0 0 0" PRE-POSITION="0 0 0"/></JointFree>
+<Segment NAME="arm"><JointHinge NAME="j1" AXIS="0 0 1" PRE-ORIENTATION="0 0 0" PRE-POSITION="100 0 0">
+<JointTemplate BIND-POSE="1.5707963267948966" PRE-ORIENTATION="0 0 0" PRE-POSITION="Arm 0 0"/></JointHinge></Segment>
+</Segment></Skeleton><MarkerSet><Markers><Marker NAME="tip"/><Marker NAME="loose"/></Markers></MarkerSet>
+<TargetSet><Targets><TargetLocalPointToWorldPoint MARKER="tip" SEGMENT="arm" POSITION="50 0 0" WEIGHT="1" HIDDEN="false">
+<TargetLocalPointToWorldPointTemplate/></TargetLocalPointToWorldPoint></Targets></TargetSet></KinematicModel>)");
+	const VJson bind = Result({"fk", "arm.qrs"}, folder);
+	ASSERT_EQ(bind.at("segments").size(), 2u);
+	EXPECT_EQ(bind["segments"][1].at("name"), "arm");
+	ExpectNear(bind["segments"][0].at("rotation"), {0, -1, 0, 1, 0, 0, 0, 0, 1}, 1e-12);
+	ExpectNear(bind["segments"][0].at("translation"), {10, 20, 1000}, 1e-12);
+	ExpectNear(bind["segments"][1]["rotation"], {-1, 0, 0, 0, -1, 0, 0, 0, 1}, 1e-12);
+	ExpectNear(bind["segments"][1]["translation"], {10, 120, 1000}, 1e-12);
+	ASSERT_EQ(bind.at("markers").size(), 2u);
+	EXPECT_EQ(bind["markers"][0].at("valid"), true);
+	ExpectNear(bind["markers"][0].at("position"), {-40, 120, 1000}, 1e-12);
+	EXPECT_EQ(bind["markers"][1].at("name"), "loose");
+	EXPECT_EQ(bind["markers"][1].at("valid"), false);
+
+	const VJson own = Result({"fk", "arm.qrs", "--state", "0,0,0,0,0,0,-1.5707963267948966"}, folder);
+	ExpectNear(own["segments"][1]["translation"], {100, 0, 0}, 1e-12);
+	ExpectNear(own["markers"][0]["position"], {100, -50, 0}, 1e-12);
+
+	const VRun rest = RunRetarget({"fk", "arm.qrs", "--pose", "tpose"}, folder.Path());
+	EXPECT_EQ(rest.m_Status, 0);
+	EXPECT_NE(rest.m_Err.find("\"arm.qrs\" holds no tpose pose: zeros take its place"), std::string::npos);
+}
+
+TEST(Convert, WritesAnyVersionAndTellsWhatItLoses)
+{
+	const VScratchFolder folder;
+	const VRun old = RunRetarget({"convert", c_Performer, "old.qrs", "--format-version", "2.6"}, folder.Path());
+	EXPECT_EQ(old.m_Status, 0);
+	EXPECT_NE(old.m_Err.find("warning retarget: This version of the format cannot hold: the model version\n"),
+	    std::string::npos)
+	    << old.m_Err;
+	EXPECT_NE(folder.Read("old.qrs").find("VERSION=\"2.6\""), std::string::npos);
+
+	const VRun same = RunRetarget({"convert", c_Performer, "same.qrs"}, folder.Path());
+	EXPECT_EQ(same.m_Status, 0);
+	EXPECT_EQ(same.m_Err, "");
+	EXPECT_EQ(Result({"dump", "same.qrs"}, folder), Result({"dump", c_Performer}, folder));
+	const VRun text = RunRetarget({"convert", "same.qrs", "-"}, folder.Path());
+	EXPECT_EQ(text.m_Out, folder.Read("same.qrs")) << "to standard output";
+	EXPECT_EQ(RunRetarget({"convert", "same.qrs", "same.qrs"}, folder.Path()).m_Status, 0);
+	EXPECT_EQ(text.m_Out, folder.Read("same.qrs")) << "onto itself";
+	EXPECT_EQ(folder.Names(), (std::vector<std::string>{"old.qrs", "same.qrs"}));
+}
+
+TEST(Schema, ToFileAndStandardOutput)
+{
+	const VScratchFolder folder;
+	const VRun run = RunRetarget({"schema"}, folder.Path());
+	EXPECT_EQ(run.m_Status, 0);
+	EXPECT_NE(run.m_Out.find("<xsd:schema"), std::string::npos) << run.m_Out.substr(0, 300);
+	EXPECT_EQ(RunRetarget({"schema", "-o", "s.xsd"}, folder.Path()).m_Status, 0);
+	EXPECT_EQ(folder.Read("s.xsd"), run.m_Out);
+	EXPECT_EQ(RunRetarget({"schema", "-o", "-"}, folder.Path()).m_Out, run.m_Out);
+}
+
+} // namespace
