@@ -153,7 +153,7 @@ void UpdateTargets(VSession& io_rSession, const std::string&)
 constexpr VEditKind c_Kinds[] = {
     {"--position", "SRC:TGT",
         "Add a position target: a point fixed to the target segment TGT follows the source segment SRC. Segments are "
-        "given by name or as #index",
+        "given by name, without a namespace, or as #index",
         AddPosition},
     {"--rotation", "SRC:TGT",
         "Add a rotation target: the orientation of the target segment TGT follows the source segment SRC", AddRotation},

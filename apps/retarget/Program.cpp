@@ -20,11 +20,13 @@ constexpr const char* c_pDescription =
 
 constexpr const char* c_pWalkThrough =
     "A first retarget subject, from the character's FBX and the performer's skeleton:\n"
-    "  retarget fbx hero.fbx                                     what is in the FBX: bones, units, axes\n"
-    "  retarget create --fbx hero.fbx --source performer.qrs --match-file-pose \\\n"
-    "      --position Hips:Hips --rotation Hips:Hips --position LeftFoot:LeftFoot -o hero.qrr\n"
-    "  retarget targets hero.qrr --source performer.qrs          the targets and how far apart they are\n"
-    "  retarget edit hero.qrr --source performer.qrs --prune-joints --update-targets -o hero.qrr\n"
+    "  retarget fbx hero.fbx                  the bones of the character, its units and axes\n"
+    "  retarget dump performer.qrs            the segments of the performer\n"
+    "  retarget create --fbx hero.fbx --source performer.qrs --position Hips:Hips --rotation Hips:Hips \\\n"
+    "      --symmetry --position LeftFoot:LeftFoot --rotation LeftArm:LeftArm \\\n"
+    "      --prune-joints --match-file-pose --update-targets -o hero.qrr\n"
+    "  retarget targets hero.qrr --source performer.qrs\n"
+    "  retarget edit hero.qrr --source performer.qrs --rotation Head:Head --weight 0=2 -o hero.qrr\n"
     "\n"
     "Results go to standard output, messages to standard error as \"level category: text\".\n"
     "Exit status: 0 fine; 1 findings; 2 wrong usage; 3 input that cannot be read or is invalid; 4 output that cannot "
