@@ -6,6 +6,8 @@
 #include "CoreOrlexQRTIO/Writer.h"
 #include "DebugServices/GlobalLog.h"
 
+#include <boost/algorithm/string/join.hpp>
+
 namespace CommandLine
 {
 namespace
@@ -16,6 +18,7 @@ struct VConvertSettings
 	std::string m_In;
 	std::string m_Out;
 	std::uint32_t m_Version = CoreOrlexQRTIO::c_AutomaticVersion;
+	std::string m_VersionText = "(automatic)";
 };
 
 EExitStatus Convert(const VConvertSettings& i_rSettings)
@@ -24,8 +27,9 @@ EExitStatus Convert(const VConvertSettings& i_rSettings)
 	const CoreOrlexTypes::VSubjectRecord& rRecord = file.m_Record;
 	const auto losses = CoreOrlexQRTIO::ListVersionLosses(
 	    rRecord.m_SubjectParametrised, rRecord.m_SubjectApplicationData, file.m_Extras, i_rSettings.m_Version);
-	for (const std::string& rLoss : losses)
-		NVX_LOG(c_pCategory, NVX::ELogWarning, "This version of the format cannot hold: %1%", rLoss);
+	if (!losses.empty())
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "Version %1% of the format cannot hold: %2%", i_rSettings.m_VersionText,
+		    boost::algorithm::join(losses, ", "));
 	WriteSubjectFile(i_rSettings.m_Out, rRecord.m_SubjectParametrised, rRecord.m_SubjectApplicationData, file.m_Extras,
 	    i_rSettings.m_Version);
 	return EFine;
@@ -53,6 +57,7 @@ VCommand AddConvertCommand(CLI::App& io_rProgram)
 			        throw CLI::ValidationError("--format-version",
 			            "the format has no version \"" + i_rText + "\", only " + CoreOrlexQRTIO::AllVersionTexts());
 		        pSettings->m_Version = *version;
+		        pSettings->m_VersionText = i_rText;
 	        },
 	        "Version of the format: " + CoreOrlexQRTIO::AllVersionTexts()
 	            + " (default: the lowest from 3.2 on that holds everything)")
