@@ -45,8 +45,8 @@ endfunction()
 # RETARGET_SOURCE the root of the tree.
 function(retarget_test name)
 	cmake_parse_arguments(PARSE_ARGV 1 arg "" "" "SOURCES;LIBRARIES")
-	add_executable(test_${name} ${arg_SOURCES})
-	target_link_libraries(test_${name} PRIVATE ${arg_LIBRARIES} GTest::gtest_main)
+	add_executable(test_${name} ${arg_SOURCES} ${CMAKE_SOURCE_DIR}/tests/TestMain.cpp)
+	target_link_libraries(test_${name} PRIVATE ${arg_LIBRARIES} GTest::gtest)
 	target_compile_definitions(test_${name} PRIVATE RETARGET_TEST_DATA="${CMAKE_SOURCE_DIR}/tests/data"
 		RETARGET_SOURCE="${CMAKE_SOURCE_DIR}")
 	add_test(NAME ${name} COMMAND test_${name})

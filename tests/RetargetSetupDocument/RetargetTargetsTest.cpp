@@ -5,6 +5,7 @@
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
 #include "RetargetSetupDocument/BindPose.h"
 #include "TestSubjects.h"
+#include "math/NumberText.h"
 
 #include <gtest/gtest.h>
 
@@ -86,7 +87,9 @@ TEST_F(RetargetTargets, ARotationTarget)
 	EXPECT_EQ(rTarget.m_RotationObservationIndices, std::vector<std::uint32_t>{0});
 	EXPECT_TRUE(rTarget.m_MarkerIndices.empty() && rTarget.m_ViewNormals.empty());
 	ASSERT_EQ(rTarget.m_StateExpressions.size(), 3u);
-	EXPECT_NEAR(std::stod(rTarget.m_StateExpressions[2]), -std::numbers::pi / 2, 1e-12);
+	double angle = 0.0;
+	ASSERT_TRUE(NumberText::ScanWholeReal(rTarget.m_StateExpressions[2], angle));
+	EXPECT_NEAR(angle, -std::numbers::pi / 2, 1e-12);
 	EXPECT_GE(rTarget.m_StateExpressions[2].size(), 17u) << "angles keep all their digits";
 	EXPECT_EQ(m_Target.m_Rotations.at(0).m_Name, "LeftArm");
 	EXPECT_EQ(m_Target.m_Rotations.at(0).m_RotationId, CoreOrlexTypes::HashName("LeftArm"));

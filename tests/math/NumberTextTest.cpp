@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <bit>
+#include <clocale>
 #include <cmath>
 #include <cstdio>
 #include <limits>
@@ -11,7 +12,15 @@
 namespace
 {
 
-/// What the C library reads: the oracle for the scanner. Run it only in the C numeric locale.
+/// The C library's number text is the oracle, and it follows the language of the process.
+class NumberText : public testing::Test
+{
+protected:
+	void SetUp() override { std::setlocale(LC_NUMERIC, "C"); }
+	void TearDown() override { std::setlocale(LC_NUMERIC, ""); }
+};
+
+/// What the C library reads.
 /// The standard calls an exponent letter or a hexadecimal mark without digits a matching failure; glibc takes the
 /// number before it. This is told apart by what glibc's last byte is.
 std::size_t LibraryScan(const std::string& i_rText, double& o_rValue)
@@ -36,14 +45,14 @@ void ExpectSameScan(const std::string& i_rText)
 	double expected = 7.0;
 	double value = 7.0;
 	const std::size_t expectedRead = LibraryScan(i_rText, expected);
-	EXPECT_EQ(NumberText::ScanReal(i_rText, value), expectedRead) << '"' << i_rText << '"';
+	EXPECT_EQ(::NumberText::ScanReal(i_rText, value), expectedRead) << '"' << i_rText << '"';
 	if (std::isnan(expected))
 		EXPECT_TRUE(std::isnan(value)) << '"' << i_rText << '"';
 	else
 		EXPECT_EQ(std::bit_cast<std::uint64_t>(value), std::bit_cast<std::uint64_t>(expected)) << '"' << i_rText << '"';
 }
 
-TEST(NumberText, ScansWhatTheLibraryScans)
+TEST_F(NumberText, ScansWhatTheLibraryScans)
 {
 	for (const char* pText :
 	    {"1", " \t\n\v\f\r1", "+1", "-1", "+-1", "", " ", ".", "-.", "1.", ".5", "1.5.2", "1e5", "1e+5", "2e", "2e+",
@@ -52,7 +61,7 @@ TEST(NumberText, ScansWhatTheLibraryScans)
 		ExpectSameScan(pText);
 }
 
-TEST(NumberText, ScansRandomTextAsTheLibraryDoes)
+TEST_F(NumberText, ScansRandomTextAsTheLibraryDoes)
 {
 	std::mt19937 generator(20);
 	const std::string alphabet = "0123456789..ee+-xXpPaf inI";
@@ -65,7 +74,7 @@ TEST(NumberText, ScansRandomTextAsTheLibraryDoes)
 	}
 }
 
-TEST(NumberText, PrintsAsPrintf)
+TEST_F(NumberText, PrintsAsPrintf)
 {
 	std::mt19937_64 generator(21);
 	for (int round = 0; round < 100000; ++round)
@@ -76,23 +85,23 @@ TEST(NumberText, PrintsAsPrintf)
 			continue;
 		char buffer[512];
 		std::snprintf(buffer, sizeof(buffer), "%.17g", value);
-		ASSERT_EQ(NumberText::PrintG17(value), buffer);
+		ASSERT_EQ(::NumberText::PrintG17(value), buffer);
 		double back = 0.0;
-		ASSERT_TRUE(NumberText::ScanWholeReal(buffer, back));
+		ASSERT_TRUE(::NumberText::ScanWholeReal(buffer, back));
 		ASSERT_EQ(back, value);
 		std::snprintf(buffer, sizeof(buffer), "%f", value);
-		ASSERT_EQ(NumberText::PrintF(value), buffer);
+		ASSERT_EQ(::NumberText::PrintF(value), buffer);
 	}
 }
 
-TEST(NumberText, PrintsWhatIsNotFiniteAsExpressionsReadIt)
+TEST_F(NumberText, PrintsWhatIsNotFiniteAsExpressionsReadIt)
 {
 	const double infinity = std::numeric_limits<double>::infinity();
 	const double notANumber = std::numeric_limits<double>::quiet_NaN();
-	EXPECT_EQ(NumberText::PrintG17(infinity), "1.#INF");
-	EXPECT_EQ(NumberText::PrintF(-infinity), "-1.#INF");
-	EXPECT_EQ(NumberText::PrintG17(notANumber), "1.#IND");
-	EXPECT_EQ(NumberText::PrintF(std::copysign(notANumber, -1.0)), "-1.#IND");
+	EXPECT_EQ(::NumberText::PrintG17(infinity), "1.#INF");
+	EXPECT_EQ(::NumberText::PrintF(-infinity), "-1.#INF");
+	EXPECT_EQ(::NumberText::PrintG17(notANumber), "1.#IND");
+	EXPECT_EQ(::NumberText::PrintF(std::copysign(notANumber, -1.0)), "-1.#IND");
 }
 
 } // namespace

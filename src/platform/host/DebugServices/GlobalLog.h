@@ -4,6 +4,7 @@
 
 #include <atomic>
 #include <functional>
+#include <locale>
 #include <memory>
 #include <string>
 
@@ -65,7 +66,7 @@ void Log(const NVX::VLogCategory& i_rCategory, int i_Level, const char* i_pForma
 	std::string message;
 	try
 	{
-		boost::format format(i_pFormat);
+		boost::format format(i_pFormat, std::locale::classic());
 		(void)(format % ... % i_rArguments);
 		message = format.str();
 	}

@@ -1,0 +1,23 @@
+#include <gtest/gtest.h>
+
+#include <clocale>
+#include <exception>
+#include <locale>
+
+/// Tests run in the language of the environment, as code inside a window's process does: number text must not care.
+int main(int i_Count, char** i_ppArguments)
+{
+	std::setlocale(LC_ALL, "");
+	try
+	{
+		std::locale::global(std::locale(""));
+	}
+	catch (const std::exception&)
+	{
+		// The environment names a language that is not installed; the C library stays in "C" then, too.
+	}
+	// What the system says of errors stays comparable.
+	std::setlocale(LC_MESSAGES, "C");
+	testing::InitGoogleTest(&i_Count, i_ppArguments);
+	return RUN_ALL_TESTS();
+}
