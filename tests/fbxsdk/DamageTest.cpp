@@ -1,4 +1,6 @@
 
+#include "fbxsdk/Limits.h"
+
 #include "FbxFileBuilder.h"
 #include "TestFile.h"
 #include "TestLog.h"
@@ -129,6 +131,38 @@ TEST(Damage, AMillionBytesOfAnythingAreReadInOneGo)
 	const std::string binary = Write(c_Forms[1], std::vector<VTestRecord>{}).substr(0, 27);
 	EXPECT_FALSE(Load(binary + repeat("\xff")).m_bComplete);
 	EXPECT_FALSE(Load(binary + repeat("\1"s + std::string(12, '\0'))).m_bComplete);
+}
+
+/// More than is kept is left out and told; what was kept is whole.
+TEST(Damage, ListsAreBounded)
+{
+	const std::string head = "; FBX 7.4.0\n";
+	const auto count = [](std::size_t i_Count, const std::string& i_rText)
+	{
+		std::string text;
+		while (i_Count-- > 0)
+			text += i_rText;
+		return text;
+	};
+	std::string nodes, connections;
+	for (std::size_t i = 1; i <= FbxFile::Limits::c_Nodes + 1; ++i)
+	{
+		const std::string number = std::to_string(i);
+		nodes.append("Model: ").append(number).append(",\"Model::a\",\"Null\"\n");
+		connections.append("C: \"OO\",").append(number).append(",0\n");
+	}
+	const VResult result = Load(head + "Objects: {\n" + nodes + "}\nConnections: {\n" + connections + "}\n");
+	EXPECT_FALSE(result.m_bComplete);
+	EXPECT_EQ(result.m_Nodes, int(FbxFile::Limits::c_Nodes) + 1);
+	const auto objects = [&](std::size_t i_Count)
+	{ return Load(head + "Objects: {\n" + count(i_Count, "Pose: 7,\"\"\n") + "}\nConnections: {\n}\n").m_bComplete; };
+	EXPECT_TRUE(objects(FbxFile::Limits::c_Objects));
+	EXPECT_FALSE(objects(FbxFile::Limits::c_Objects + 1));
+	const auto records = [&](std::size_t i_Count)
+	{ return Load(head + "Objects: {\n}\nConnections: {\n}\n" + count(i_Count, "A:1\n")).m_bComplete; };
+	// The root and the two sections are records too.
+	EXPECT_TRUE(records(FbxFile::Limits::c_Records - 3));
+	EXPECT_FALSE(records(FbxFile::Limits::c_Records - 2));
 }
 
 } // namespace
