@@ -21,7 +21,7 @@ namespace
 void WriteRealList(
     VWriterNode& io_rNode, const VAttribute& i_rAttribute, std::span<const double> i_Values, bool i_bPlaceholders)
 {
-	if (i_Values.empty() || !IsInVersion(io_rNode, i_rAttribute))
+	if ((i_Values.empty() && !i_rAttribute.m_bRequired) || !IsInVersion(io_rNode, i_rAttribute))
 		return;
 	std::string text;
 	text.reserve(20 * i_Values.size());

@@ -30,7 +30,7 @@ void WriteReal(UtilsRapidXml::VWriterNode& io_rNode, const Format::VAttribute& i
 /// Not at all if the value is at the mark for "not set".
 void WriteRealIfSet(UtilsRapidXml::VWriterNode& io_rNode, const Format::VAttribute& i_rAttribute, double i_Value);
 
-/// Not at all if the list is empty.
+/// Not at all if the list is empty and the attribute is not required.
 void WriteReals(
     UtilsRapidXml::VWriterNode& io_rNode, const Format::VAttribute& i_rAttribute, std::span<const double> i_Values);
 

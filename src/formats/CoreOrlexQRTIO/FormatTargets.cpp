@@ -138,7 +138,8 @@ void FormatTarget(INode& io_rNode, VReading& io_rReading)
 
 	const std::size_t errors = io_rNode.GetErrorCount();
 	VTargetInHand inHand;
-	auto& [rTarget, rApplicationData, rAxis] = inHand;
+	VTarget& rTarget = inHand.m_Target;
+	VSubjectApplicationData::VTarget& rApplicationData = inHand.m_ApplicationData;
 	rTarget.m_Type = rKind.m_Type;
 	rTarget.m_StateExpressions.assign(rKind.m_StateSize, "0");
 	rTarget.m_Covariance.assign(rKind.m_CovarianceSize, 0.0);
@@ -208,7 +209,7 @@ void FormatTarget(INode& io_rNode, VReading& io_rReading)
 
 	if (io_rNode.GetErrorCount() != errors)
 		return;
-	io_rReading.m_rExtras.m_Targets.push_back({rApplicationData.m_Name, std::move(rAxis)});
+	io_rReading.m_rExtras.m_Targets.push_back({rApplicationData.m_Name, std::move(inHand.m_Axis)});
 	io_rReading.m_rSubject.m_Targets.push_back(std::move(rTarget));
 	io_rReading.m_rApplicationData.m_Targets.push_back(std::move(rApplicationData));
 }

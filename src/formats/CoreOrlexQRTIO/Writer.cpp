@@ -2,6 +2,7 @@
 
 #include "CoreOrlexQRTIO/AttributeWriting.h"
 #include "CoreOrlexQRTIO/EnumTables.h"
+#include "CoreOrlexQRTIO/ExpressionList.h"
 #include "CoreOrlexQRTIO/FormatTable.h"
 #include "CoreOrlexQRTIO/FormatVersions.h"
 #include "CoreOrlexQRTIO/WriteSections.h"
@@ -126,6 +127,16 @@ const std::string* NameOfMarker(VWriterNode& io_rNode, VWriting& io_rWriting, st
 
 void WriteParameters(VWriterNode& io_rNode, VWriting& io_rWriting)
 {
+	// Texts lose blanks at their ends, and then the expressions that use the name would not find it.
+	const auto checkName = [&](const std::string& i_rName)
+	{
+		if (Trimmed(i_rName) != i_rName)
+			io_rNode.AddError((boost::format("Parameter '%1%' has blanks at the ends of its name.") % i_rName).str());
+	};
+	for (const VSubjectParametrised::VStaticParameter& rParameter : io_rWriting.m_rSubject.m_StaticParameters)
+		checkName(rParameter.m_Name);
+	for (const VSubjectParametrised::VDynamicParameter& rParameter : io_rWriting.m_rSubject.m_DynamicParameters)
+		checkName(rParameter.m_Name);
 	for (const VSubjectParametrised::VStaticParameter& rParameter : io_rWriting.m_rSubject.m_StaticParameters)
 		WriteElement(io_rNode, Format::Parameters::c_StaticParameter,
 		    [&](VWriterNode& io_rParameter)
