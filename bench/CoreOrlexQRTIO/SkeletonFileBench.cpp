@@ -51,8 +51,12 @@ VContent MakeContent(std::size_t i_Segments)
 		VSubjectParametrised::VJoint& rJoint = segment.m_Joint;
 		rJoint.m_Name = segment.m_Name + "Joint";
 		rJoint.m_JointType = VSubjectParametrised::VJoint::EBall;
-		rJoint.m_Mean = rJoint.m_TemplateMean = rJoint.m_BindPose = numbers(3);
-		rJoint.m_Covariance = rJoint.m_TemplateCovariance = numbers(9);
+		for (std::vector<double>* pState : {&rJoint.m_Mean, &rJoint.m_TPoseMean, &rJoint.m_TemplateMean,
+		         &rJoint.m_RangeCentringState, &rJoint.m_TemplateRangeCentringState, &rJoint.m_BindPose})
+			*pState = numbers(3);
+		for (std::vector<double>* pMatrix : {&rJoint.m_Covariance, &rJoint.m_TPoseCovariance,
+		         &rJoint.m_TemplateCovariance, &rJoint.m_RangeMatrix, &rJoint.m_TemplateRangeMatrix})
+			*pMatrix = numbers(9);
 		content.m_Subject.m_Segments.push_back(std::move(segment));
 		content.m_Subject.m_Markers.emplace_back().m_Name = "Marker" + std::to_string(i);
 		VSubjectParametrised::VTarget& rTarget = content.m_Subject.m_Targets.emplace_back();

@@ -152,6 +152,13 @@ c.m_Subject.m_Segments[1].m_PreTranslation = {"'Global Scale'*2", "-'Global Scal
 	"Parse Error at column 2: ID \"x\" was referenced but never declared"
 }
 }
+, {"ParameterNameWithBlanksAtItsEnds", CHANGE{c.m_Subject.m_DynamicParameters.push_back({" b", 0, 0, 1, true});
+}
+,
+{
+	"Parameter ' b' has blanks at the ends of its name."
+}
+}
 , {"NameWithControlByte", CHANGE{c.m_Subject.m_Segments[1].m_Name = "A\x01";
 }
 ,

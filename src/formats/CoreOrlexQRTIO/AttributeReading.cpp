@@ -2,7 +2,10 @@
 
 #include "CoreOrlexQRTIO/ExpressionList.h"
 
+#include "math/NumberText.h"
+
 #include <algorithm>
+#include <cmath>
 
 namespace CoreOrlexQRTIO
 {
@@ -11,59 +14,92 @@ using Format::VAttribute;
 using UtilsRapidXml::INode;
 using UtilsRapidXml::ReadAttribute;
 
+namespace
+{
+
+/// What stands between the values of a list, in the C form.
+constexpr std::string_view c_White = " \t\n\v\f\r";
+
+std::string_view AfterWhite(std::string_view i_Text)
+{
+	return i_Text.substr(std::min(i_Text.find_first_not_of(c_White), i_Text.size()));
+}
+
+/// Where the text of a list stands while it is cut, so that a file of many lists does not allocate for each.
+std::string& ListText()
+{
+	static thread_local std::string s_Text;
+	return s_Text;
+}
+
+} // namespace
+
 bool ReadExpressions(INode& io_rNode, const VAttribute& i_rAttribute, std::span<std::string> o_Expressions)
 {
-	std::string text;
-	if (!ReadAttribute(io_rNode, i_rAttribute, text))
+	std::string& rText = ListText();
+	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
 		return false;
-	const std::vector<std::string_view> tokens = CutExpressions(text);
-	if (tokens.size() != o_Expressions.size())
+	std::size_t count = 0;
+	for (std::string_view rest = Trimmed(rText); !rest.empty(); ++count)
+		TakeExpression(rest);
+	if (count != o_Expressions.size())
 	{
 		UtilsRapidXml::AddIncorrectCount(io_rNode, i_rAttribute.m_Name);
 		return false;
 	}
-	std::ranges::copy(tokens, o_Expressions.begin());
+	std::string_view rest = Trimmed(rText);
+	for (std::string& rExpression : o_Expressions)
+		rExpression = TakeExpression(rest);
 	return true;
 }
 
 bool ReadReals(INode& io_rNode, const VAttribute& i_rAttribute, std::vector<double>& o_rValues)
 {
-	std::string text;
-	if (!ReadAttribute(io_rNode, i_rAttribute, text))
+	std::string& rText = ListText();
+	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
 		return false;
-	const std::vector<std::string_view> parts = UtilsRapidXml::SplitBlanks(text);
-	std::vector<double> values(parts.size());
-	for (std::size_t i = 0; i < parts.size(); ++i)
-		if (!UtilsRapidXml::ToValue(parts[i], values[i]))
+	std::vector<double> values;
+	for (std::string_view rest = rText; !AfterWhite(rest).empty();)
+	{
+		double value = 0.0;
+		const std::size_t read = NumberText::ScanReal(rest, value);
+		rest.remove_prefix(read);
+		if (read == 0 || (!rest.empty() && c_White.find(rest.front()) == std::string_view::npos)
+		    || !std::isfinite(value))
 		{
 			UtilsRapidXml::AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
 			return false;
 		}
+		values.push_back(value);
+	}
 	o_rValues = std::move(values);
 	return true;
 }
 
 bool ReadColour(INode& io_rNode, const VAttribute& i_rAttribute, CoreOrlexTypes::VColour& o_rColour)
 {
-	std::string text;
-	if (!ReadAttribute(io_rNode, i_rAttribute, text))
+	std::string& rText = ListText();
+	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
 		return false;
-	const std::vector<std::string_view> parts = UtilsRapidXml::SplitBlanks(text);
-	if (parts.size() != 3)
+	std::uint8_t values[3];
+	std::size_t count = 0;
+	bool bConverted = true;
+	for (std::string_view rest = rText; (rest = AfterWhite(rest)).size() > 0; ++count)
 	{
-		UtilsRapidXml::AddIncorrectCount(io_rNode, i_rAttribute.m_Name);
-		return false;
+		const std::size_t end = std::min(rest.find_first_of(c_White), rest.size());
+		std::uint32_t value = 0;
+		bConverted = bConverted && UtilsRapidXml::ToValue(rest.substr(0, end), value);
+		if (count < 3)
+			values[count] = static_cast<std::uint8_t>(std::min(value, 255u));
+		rest.remove_prefix(end);
 	}
-	std::uint32_t values[3];
-	for (int i = 0; i < 3; ++i)
-		if (!UtilsRapidXml::ToValue(parts[i], values[i]))
-		{
-			UtilsRapidXml::AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
-			return false;
-		}
-	const auto component = [&](int i_Index) { return static_cast<std::uint8_t>(std::min(values[i_Index], 255u)); };
-	o_rColour = {component(0), component(1), component(2), 255};
-	return true;
+	if (count == 3 && bConverted)
+	{
+		o_rColour = {values[0], values[1], values[2], 255};
+		return true;
+	}
+	(count == 3 ? UtilsRapidXml::AddNotInterpreted : UtilsRapidXml::AddIncorrectCount)(io_rNode, i_rAttribute.m_Name);
+	return false;
 }
 
 bool ReadOpacity(INode& io_rNode, const VAttribute& i_rAttribute, std::uint8_t& o_rAlpha)

@@ -13,24 +13,43 @@ std::string_view Trimmed(std::string_view i_Text)
 	return i_Text.substr(first, i_Text.find_last_not_of(" \t") + 1 - first);
 }
 
+std::string_view TakeExpression(std::string_view& io_rText)
+{
+	if (io_rText.empty())
+		return {};
+	const std::size_t quote = io_rText.front() == '-' ? 1 : 0;
+	std::size_t from = 0;
+	if (quote < io_rText.size() && io_rText[quote] == '\'')
+	{
+		const std::size_t closing = io_rText.find('\'', quote + 1);
+		if (closing != std::string_view::npos)
+			from = closing + 1;
+	}
+	const std::size_t end = std::min(io_rText.find(' ', from), io_rText.size());
+	const std::string_view token = io_rText.substr(0, end);
+	io_rText.remove_prefix(std::min(io_rText.find_first_not_of(' ', end), io_rText.size()));
+	return token;
+}
+
 std::vector<std::string_view> CutExpressions(std::string_view i_Text)
 {
 	std::vector<std::string_view> tokens;
 	for (std::string_view rest = Trimmed(i_Text); !rest.empty();)
-	{
-		const std::size_t quote = rest.front() == '-' ? 1 : 0;
-		std::size_t from = 0;
-		if (quote < rest.size() && rest[quote] == '\'')
-		{
-			const std::size_t closing = rest.find('\'', quote + 1);
-			if (closing != std::string_view::npos)
-				from = closing + 1;
-		}
-		const std::size_t end = std::min(rest.find(' ', from), rest.size());
-		tokens.push_back(rest.substr(0, end));
-		rest.remove_prefix(std::min(rest.find_first_not_of(' ', end), rest.size()));
-	}
+		tokens.push_back(TakeExpression(rest));
 	return tokens;
+}
+
+bool IsPlainNumber(std::string_view i_Text)
+{
+	if (i_Text.starts_with('-'))
+		i_Text.remove_prefix(1);
+	std::size_t digits = 0;
+	for (const char byte : i_Text)
+		if (byte >= '0' && byte <= '9')
+			++digits;
+		else if (byte != '.')
+			return false;
+	return digits > 0 && digits + 1 >= i_Text.size();
 }
 
 bool JoinExpressions(std::span<const std::string> i_Expressions, std::string& o_rText)

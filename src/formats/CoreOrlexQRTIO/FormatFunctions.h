@@ -6,6 +6,7 @@
 #include "CoreOrlexTypes/SubjectParametrised.h"
 
 #include <cstddef>
+#include <functional>
 #include <string>
 #include <unordered_map>
 #include <unordered_set>
@@ -30,7 +31,9 @@ struct VReading
 	VIndexByName m_SegmentsByName{};
 	VIndexByName m_MarkersByName{};
 	VIndexByName m_RotationsByName{};
+	/// Filled when there are subspaces to read.
 	VIndexByName m_JointsByName{};
+	/// Of hashed ids only; counted ones do not collide.
 	std::unordered_set<std::uint32_t> m_MarkerIds{};
 	std::unordered_set<std::uint32_t> m_RotationIds{};
 };
@@ -71,7 +74,7 @@ template <typename TFunction>
 void Process(UtilsRapidXml::INode& io_rNode, const Format::VElement& i_rElement, const TFunction& i_rFunction)
 {
 	Declare(io_rNode, i_rElement);
-	io_rNode.ProcessElements(i_rFunction);
+	io_rNode.ProcessElements(std::cref(i_rFunction));
 }
 
 } // namespace CoreOrlexQRTIO

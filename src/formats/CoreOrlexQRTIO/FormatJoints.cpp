@@ -14,22 +14,33 @@ using UtilsRapidXml::INode;
 using UtilsRapidXml::ReadAttribute;
 using UtilsRapidXml::ReadList;
 
-/// What the joint itself told, so that the template does not replace it.
-struct VOwnPost
+/// What joint and template told. The template's word counts for the pose before the joint, the joint's for the one
+/// behind it.
+struct VTold
 {
 	bool m_bInverseOrientation = false;
 	bool m_bInversePosition = false;
+	bool m_bTemplateOrientation = false;
+	bool m_bTemplatePosition = false;
 };
 
-bool ReadNumbersAsExpressions(
-    INode& io_rNode, const Format::VAttribute& i_rAttribute, std::array<std::string, 3>& o_rExpressions)
+/// The joint's numbers as expressions, which only hold until a template tells its own.
+struct VOwnPre
 {
-	std::array<double, 3> values{};
-	if (!ReadList(io_rNode, i_rAttribute, 3, values.data()))
-		return false;
-	std::ranges::transform(values, o_rExpressions.begin(), NumberText::PrintG17);
-	return true;
-}
+	VOwnPre(INode& io_rNode, const Format::VAttribute& i_rAttribute)
+	    : m_bGiven(ReadList(io_rNode, i_rAttribute, 3, m_Values.data()))
+	{
+	}
+
+	void Take(bool i_bTemplate, std::array<std::string, 3>& o_rExpressions) const
+	{
+		if (m_bGiven && !i_bTemplate)
+			std::ranges::transform(m_Values, o_rExpressions.begin(), NumberText::PrintG17);
+	}
+
+	std::array<double, 3> m_Values{};
+	bool m_bGiven;
+};
 
 /// Three expressions, or an empty list if the attribute is not there.
 void ReadExpressionTriple(
@@ -40,7 +51,7 @@ void ReadExpressionTriple(
 		o_rExpressions.assign(expressions.begin(), expressions.end());
 }
 
-void FormatJointTemplate(INode& io_rNode, VSegmentInHand& io_rSegment, VOwnPost i_Own)
+void FormatJointTemplate(INode& io_rNode, VSegmentInHand& io_rSegment, VTold& io_rTold)
 {
 	namespace Table = Format::JointTemplate;
 	VSubjectParametrised::VSegment& rSegment = io_rSegment.m_Segment;
@@ -54,13 +65,13 @@ void FormatJointTemplate(INode& io_rNode, VSegmentInHand& io_rSegment, VOwnPost 
 	ReadList(io_rNode, Table::c_TPoseMean, stateSize, rJoint.m_TPoseMean);
 	ReadList(io_rNode, Table::c_TPoseCovariance, covarianceSize, rJoint.m_TPoseCovariance);
 	ReadList(io_rNode, Table::c_BindPose, stateSize, rJoint.m_BindPose);
-	ReadExpressions(io_rNode, Table::c_PreOrientation, rSegment.m_PreRotation);
-	ReadExpressions(io_rNode, Table::c_PrePosition, rSegment.m_PreTranslation);
+	io_rTold.m_bTemplateOrientation = ReadExpressions(io_rNode, Table::c_PreOrientation, rSegment.m_PreRotation);
+	io_rTold.m_bTemplatePosition = ReadExpressions(io_rNode, Table::c_PrePosition, rSegment.m_PreTranslation);
 	if (ReadList(io_rNode, Table::c_InversePostOrientation, 3, rExtras.m_TemplateInversePostOrientation)
-	    && !i_Own.m_bInverseOrientation)
+	    && !io_rTold.m_bInverseOrientation)
 		std::ranges::copy(rExtras.m_TemplateInversePostOrientation, rSegment.m_InversePostRotation.begin());
 	if (ReadList(io_rNode, Table::c_InversePostPosition, 3, rExtras.m_TemplateInversePostPosition)
-	    && !i_Own.m_bInversePosition)
+	    && !io_rTold.m_bInversePosition)
 		std::ranges::copy(rExtras.m_TemplateInversePostPosition, rSegment.m_InversePostTranslation.begin());
 	ReadList(io_rNode, Table::c_PostOrientation, 3, rExtras.m_TemplatePostOrientation);
 	ReadList(io_rNode, Table::c_PostPosition, 3, rExtras.m_TemplatePostPosition);
@@ -86,12 +97,12 @@ void FormatJoint(INode& io_rNode, VSegmentInHand& io_rSegment)
 	const std::size_t covarianceSize = CoreOrlexTypes::CovarianceSize(type);
 
 	ReadAttribute(io_rNode, Table::c_Name, rJoint.m_Name);
-	ReadNumbersAsExpressions(io_rNode, Table::c_PreOrientation, rSegment.m_PreRotation);
-	ReadNumbersAsExpressions(io_rNode, Table::c_PrePosition, rSegment.m_PreTranslation);
-	VOwnPost own;
-	own.m_bInverseOrientation =
+	const VOwnPre orientation(io_rNode, Table::c_PreOrientation);
+	const VOwnPre position(io_rNode, Table::c_PrePosition);
+	VTold told;
+	told.m_bInverseOrientation =
 	    ReadList(io_rNode, Table::c_InversePostOrientation, 3, rSegment.m_InversePostRotation.data());
-	own.m_bInversePosition =
+	told.m_bInversePosition =
 	    ReadList(io_rNode, Table::c_InversePostPosition, 3, rSegment.m_InversePostTranslation.data());
 	ReadExpressionTriple(io_rNode, Table::c_PostOrientation, rExtras.m_PostOrientation);
 	ReadExpressionTriple(io_rNode, Table::c_PostPosition, rExtras.m_PostPosition);
@@ -117,7 +128,9 @@ void FormatJoint(INode& io_rNode, VSegmentInHand& io_rSegment)
 	}
 
 	Process(io_rNode, Table::c_JointTemplate,
-	    [&](INode& io_rTemplate) { FormatJointTemplate(io_rTemplate, io_rSegment, own); });
+	    [&](INode& io_rTemplate) { FormatJointTemplate(io_rTemplate, io_rSegment, told); });
+	orientation.Take(told.m_bTemplateOrientation, rSegment.m_PreRotation);
+	position.Take(told.m_bTemplatePosition, rSegment.m_PreTranslation);
 
 	if (type == VJoint::EFree || type == VJoint::EBall)
 		ReadAttribute(io_rNode, Table::c_EulerOrder, EnumTables::EulerOrder(),

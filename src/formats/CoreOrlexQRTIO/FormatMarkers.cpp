@@ -115,7 +115,8 @@ void FormatMarker(INode& io_rNode, VReading& io_rReading)
 	}
 	rExtras.m_Name = rMarker.m_Name;
 	io_rReading.m_MarkersByName.emplace(rMarker.m_Name, index);
-	io_rReading.m_MarkerIds.insert(rMarker.m_MarkerId);
+	if (io_rReading.m_bHashedIds)
+		io_rReading.m_MarkerIds.insert(rMarker.m_MarkerId);
 	io_rReading.m_rSubject.m_Markers.push_back(std::move(rMarker));
 	io_rReading.m_rApplicationData.m_Markers.push_back(rApplicationData);
 	io_rReading.m_rExtras.m_Markers.push_back(std::move(rExtras));

@@ -60,7 +60,6 @@ using UtilsRapidXml::ReadAttribute;
 		return false;
 	rExtras.m_Name = rSegment.m_Name;
 	io_rReading.m_SegmentsByName.emplace(rSegment.m_Name, rSegment.m_SegmentIndex);
-	io_rReading.m_JointsByName.emplace(rSegment.m_Joint.m_Name, rSegment.m_SegmentIndex);
 	std::vector<double>& rConstraints = io_rReading.m_rSubject.m_TPoseConstraints;
 	rConstraints.insert(rConstraints.end(), rT.begin(), rT.end());
 	io_rReading.m_rSubject.m_Segments.push_back(std::move(rSegment));

@@ -71,6 +71,8 @@ void FormatPcaControlledParams(INode& io_rNode, VReading& io_rReading)
 void FormatSubjectDynamicSubspace(INode& io_rNode, VReading& io_rReading)
 {
 	io_rReading.m_rExtras.m_DynamicSubspaces.clear();
+	for (const VSegment& rSegment : io_rReading.m_rSubject.m_Segments)
+		io_rReading.m_JointsByName.emplace(rSegment.m_Joint.m_Name, rSegment.m_SegmentIndex);
 	Process(io_rNode, Format::Subspace::c_PcaControlledParams,
 	    [&](INode& io_rSubspace) { FormatPcaControlledParams(io_rSubspace, io_rReading); });
 	// A subject whose joints cannot move has no states that could vary together.

@@ -1,6 +1,7 @@
 #include "CoreOrlexQRTIO/ReadChecks.h"
 
 #include "CoreOrlexQRTIO/Evaluation.h"
+#include "CoreOrlexQRTIO/ExpressionList.h"
 #include "CoreOrlexTypes/NameHash.h"
 
 #include <boost/format.hpp>
@@ -106,7 +107,8 @@ bool CheckExpressions(
 		const VSubjectQRTExtras::VJoint& rExtras = i_rReading.m_rExtras.m_Segments[i].m_Joint;
 		const auto check = [&](const std::string& i_rExpression)
 		{
-			if (io_rParser.Evaluate(i_rExpression, value, error))
+			if (i_rExpression.empty() || IsPlainNumber(i_rExpression)
+			    || io_rParser.Evaluate(i_rExpression, value, error))
 				return;
 			bFine = false;
 			io_rWarnings.push_back(
@@ -129,7 +131,7 @@ bool CheckExpressions(
 
 	for (std::size_t i = 0; i < rSubject.m_Targets.size(); ++i)
 		for (const std::string& rExpression : rSubject.m_Targets[i].m_StateExpressions)
-			if (!io_rParser.Evaluate(rExpression, value, error))
+			if (!IsPlainNumber(rExpression) && !io_rParser.Evaluate(rExpression, value, error))
 				io_rWarnings.push_back((boost::format("Target '%1%' has the invalid state expression '%2%': %3%")
 				    % i_rReading.m_rApplicationData.m_Targets[i].m_Name % rExpression % error)
 				                           .str());

@@ -36,13 +36,13 @@ struct VDocument::VContent
 	rapidxml::xml_document<char> m_Document;
 };
 
-VDocument::VDocument() : m_pContent(std::make_unique<VContent>()) {}
+VDocument::VDocument() : m_pContent(std::make_unique_for_overwrite<VContent>()) {}
 
 VDocument::~VDocument() = default;
 
 bool VDocument::Parse(std::string i_Text, std::string& o_rError)
 {
-	m_pContent = std::make_unique<VContent>();
+	m_pContent = std::make_unique_for_overwrite<VContent>();
 	if (!CheckText(i_Text, o_rError))
 		return false;
 	m_pContent->m_Text = std::move(i_Text);
@@ -58,7 +58,7 @@ bool VDocument::Parse(std::string i_Text, std::string& o_rError)
 	{
 		o_rError = rError.what();
 	}
-	m_pContent = std::make_unique<VContent>();
+	m_pContent = std::make_unique_for_overwrite<VContent>();
 	return false;
 }
 

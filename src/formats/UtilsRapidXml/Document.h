@@ -9,6 +9,8 @@ namespace rapidxml
 template <class Ch>
 class xml_node;
 template <class Ch>
+class xml_attribute;
+template <class Ch>
 class xml_document;
 } // namespace rapidxml
 
@@ -16,6 +18,7 @@ namespace UtilsRapidXml
 {
 
 using VXmlNode = rapidxml::xml_node<char>;
+using VXmlAttribute = rapidxml::xml_attribute<char>;
 
 /// An XML document in memory, with the text that its nodes point into: parsed from a text, or built and then printed.
 /// rapidxml stays behind it.

@@ -31,7 +31,7 @@ public:
 	/// Makes a type known to the schema; no effect when reading. The table must outlive the document.
 	virtual void DeclareEnum(const IEnum& i_rEnum) = 0;
 
-	/// Adds a child element to the pending list.
+	/// Adds a child element to the pending list. The texts must last until the list is processed.
 	virtual void DeclareElement(std::string_view i_Name, std::string_view i_Doc, std::uint32_t i_MinimumCount,
 	    std::uint32_t i_MaximumCount, VVersion i_Minimum = {}, VVersion i_Maximum = {}) = 0;
 

@@ -3,6 +3,7 @@
 #include <rapidxml/rapidxml.hpp>
 
 #include <algorithm>
+#include <set>
 
 namespace UtilsRapidXml
 {
@@ -33,6 +34,11 @@ std::string Path(const VXmlNode* i_pElement)
 	return path;
 }
 
+std::uint64_t Bit(std::string_view i_Name)
+{
+	return std::uint64_t(1) << ((i_Name.size() * 7 + i_Name.back() * 3 + i_Name.front()) % 64);
+}
+
 bool Contains(const std::vector<std::string_view>& i_rNames, std::string_view i_Name)
 {
 	return std::find(i_rNames.begin(), i_rNames.end(), i_Name) != i_rNames.end();
@@ -47,8 +53,18 @@ VReaderNode::VReaderNode(VDocument& i_rDocument, bool i_bStrictOrder)
 }
 
 VReaderNode::VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pGlobal)
-    : m_pElement(i_pElement), m_Name(UtilsRapidXml::Name(i_pElement)), m_pGlobal(std::move(i_pGlobal))
+    : m_pElement(i_pElement), m_Name(UtilsRapidXml::Name(i_pElement)), m_pGlobal(std::move(i_pGlobal)),
+      m_pNextAttribute(i_pElement->first_attribute())
 {
+	if (m_pGlobal->m_SpareNotes.empty())
+		m_pNotes = std::make_unique<VNotes>();
+	else
+	{
+		m_pNotes = std::move(m_pGlobal->m_SpareNotes.back());
+		m_pGlobal->m_SpareNotes.pop_back();
+	}
+	for (const VXmlAttribute* pAttribute = m_pNextAttribute; pAttribute; pAttribute = pAttribute->next_attribute())
+		m_AttributeBits |= Bit(UtilsRapidXml::Name(pAttribute));
 }
 
 VReaderNode::~VReaderNode()
@@ -57,27 +73,27 @@ VReaderNode::~VReaderNode()
 	for (const VXmlNode* pChild = m_pElement->first_node(); pChild; pChild = pChild->next_sibling())
 	{
 		const std::string_view name = UtilsRapidXml::Name(pChild);
-		if (!Contains(m_RecognisedChildren, name) && told.insert(name).second)
+		if (!Contains(m_pNotes->m_RecognisedChildren, name) && told.insert(name).second)
 			m_pGlobal->m_Warnings.Add("Ignoring unrecognised element type: %1%", [&] { return Path(pChild); });
 	}
+	const std::vector<const char*>& rRecognised = m_pNotes->m_RecognisedAttributes;
 	for (const auto* pAttribute = m_pElement->first_attribute(); pAttribute; pAttribute = pAttribute->next_attribute())
-		if (std::find(m_RecognisedAttributes.begin(), m_RecognisedAttributes.end(), pAttribute->name())
-		    == m_RecognisedAttributes.end())
+		if (std::find(rRecognised.begin(), rRecognised.end(), pAttribute->name()) == rRecognised.end())
 			m_pGlobal->m_Warnings.Add("Ignoring unrecognised attribute: %1%",
 			    [&] { return (Path(m_pElement) += '/') += UtilsRapidXml::Name(pAttribute); });
+	m_pNotes->m_Pending.clear();
+	m_pNotes->m_RecognisedChildren.clear();
+	m_pNotes->m_RecognisedAttributes.clear();
+	m_pGlobal->m_SpareNotes.push_back(std::move(m_pNotes));
 }
 
 void VReaderNode::DeclareElement(std::string_view i_Name, std::string_view, std::uint32_t i_MinimumCount,
     std::uint32_t i_MaximumCount, VVersion i_Minimum, VVersion i_Maximum)
 {
-	// A choice is of six.
-	if (m_Pending.empty())
-		m_Pending.reserve(6);
-	m_Pending.push_back({std::string(i_Name), i_MinimumCount, i_MaximumCount, i_Minimum, i_Maximum});
+	m_pNotes->m_Pending.push_back({i_Name, i_MinimumCount, i_MaximumCount, i_Minimum, i_Maximum});
 }
 
-void VReaderNode::Match(
-    const VDeclaration& i_rDeclaration, bool i_bChoice, std::string& io_rChosen, std::vector<VMatch>& io_rMatches)
+void VReaderNode::Match(const VDeclaration& i_rDeclaration, bool i_bChoice, std::string& io_rChosen)
 {
 	VMessages& rErrors = m_pGlobal->m_Errors;
 	const auto path = [this] { return Path(m_pElement); };
@@ -88,8 +104,8 @@ void VReaderNode::Match(
 		const std::string_view name = UtilsRapidXml::Name(pChild);
 		if (name != i_rDeclaration.m_Name)
 			continue;
-		if (!Contains(m_RecognisedChildren, name))
-			m_RecognisedChildren.push_back(name);
+		if (!Contains(m_pNotes->m_RecognisedChildren, name))
+			m_pNotes->m_RecognisedChildren.push_back(name);
 		const auto childPath = [pChild] { return Path(pChild); };
 		if (!InRange(GetVersion(), i_rDeclaration.m_Minimum, i_rDeclaration.m_Maximum))
 		{
@@ -116,7 +132,7 @@ void VReaderNode::Match(
 			    "%1% element must have a maximum of %2% %3% child elements", path, i_rDeclaration.m_MaximumCount, name);
 			continue;
 		}
-		io_rMatches.push_back({position, pChild});
+		m_pNotes->m_Matches.push_back({position, pChild});
 	}
 	if (!i_bChoice && count < i_rDeclaration.m_MinimumCount)
 		rErrors.Add("%1% element must have a minimum of %2% %3% child elements", path, i_rDeclaration.m_MinimumCount,
@@ -125,26 +141,30 @@ void VReaderNode::Match(
 
 void VReaderNode::ProcessElements(const std::function<void(INode&)>& i_rCallback, bool i_bChoice)
 {
-	if (m_Pending.empty())
+	std::vector<VDeclaration>& rPending = m_pNotes->m_Pending;
+	if (rPending.empty())
 		return;
 	std::string chosen;
-	std::vector<VMatch> matches;
-	for (const VDeclaration& rDeclaration : m_Pending)
-		Match(rDeclaration, i_bChoice, chosen, matches);
+	std::vector<VMatch>& rMatches = m_pNotes->m_Matches;
+	rMatches.clear();
+	for (const VDeclaration& rDeclaration : rPending)
+		Match(rDeclaration, i_bChoice, chosen);
 	if (i_bChoice && chosen.empty())
 	{
 		std::string names;
-		for (const VDeclaration& rDeclaration : m_Pending)
+		for (const VDeclaration& rDeclaration : rPending)
 			(names += ' ') += rDeclaration.m_Name;
 		m_pGlobal->m_Errors.Add(
 		    "%1% element must have a one of the following child elements:%2%", [this] { return Path(m_pElement); },
 		    names);
 	}
-	m_Pending.clear();
+	rPending.clear();
 	// Each declaration's matches stand in order already.
-	std::stable_sort(matches.begin(), matches.end(),
-	    [](const VMatch& i_rLeft, const VMatch& i_rRight) { return i_rLeft.m_Position < i_rRight.m_Position; });
-	for (const VMatch& rMatch : matches)
+	const auto isBefore = [](const VMatch& i_rLeft, const VMatch& i_rRight)
+	{ return i_rLeft.m_Position < i_rRight.m_Position; };
+	if (!std::is_sorted(rMatches.begin(), rMatches.end(), isBefore))
+		std::stable_sort(rMatches.begin(), rMatches.end(), isBefore);
+	for (const VMatch& rMatch : rMatches)
 	{
 		VReaderNode child(rMatch.m_pElement, m_pGlobal);
 		i_rCallback(child);
@@ -154,14 +174,29 @@ void VReaderNode::ProcessElements(const std::function<void(INode&)>& i_rCallback
 bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string& o_rText, std::string_view,
     std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum, VVersion i_Maximum)
 {
-	const auto* pAttribute = m_pElement->first_attribute();
-	while (pAttribute && UtilsRapidXml::Name(pAttribute) != i_Name)
+	// Attributes nearly always stand in the order in which they are asked for: the search goes on where the last one
+	// was found.
+	const auto is = [&](const VXmlAttribute* i_pAttribute)
+	{
+		return i_pAttribute->name_size() == i_Name.size() && *i_pAttribute->name() == i_Name.front()
+		    && UtilsRapidXml::Name(i_pAttribute) == i_Name;
+	};
+	const bool bMaybe = (m_AttributeBits & Bit(i_Name)) != 0;
+	const VXmlAttribute* pAttribute = bMaybe ? m_pNextAttribute : nullptr;
+	while (pAttribute && !is(pAttribute))
 		pAttribute = pAttribute->next_attribute();
+	if (!pAttribute && bMaybe)
+	{
+		pAttribute = m_pElement->first_attribute();
+		while (pAttribute != m_pNextAttribute && !is(pAttribute))
+			pAttribute = pAttribute->next_attribute();
+		if (pAttribute == m_pNextAttribute)
+			pAttribute = nullptr;
+	}
 	if (pAttribute)
 	{
-		if (m_RecognisedAttributes.empty())
-			m_RecognisedAttributes.reserve(16);
-		m_RecognisedAttributes.push_back(pAttribute->name());
+		m_pNextAttribute = pAttribute->next_attribute();
+		m_pNotes->m_RecognisedAttributes.push_back(pAttribute->name());
 	}
 
 	if (!InRange(GetVersion(), i_Minimum, i_Maximum))

@@ -5,9 +5,9 @@
 #include "UtilsRapidXml/Node.h"
 
 #include <memory>
-#include <set>
 #include <string>
 #include <string_view>
+#include <unordered_set>
 #include <vector>
 
 namespace UtilsRapidXml
@@ -18,6 +18,32 @@ namespace UtilsRapidXml
 /// document must outlive them. Nothing is thrown for what a file holds.
 class VReaderNode final : public INode
 {
+	struct VDeclaration
+	{
+		std::string_view m_Name;
+		std::uint32_t m_MinimumCount;
+		std::uint32_t m_MaximumCount;
+		VVersion m_Minimum;
+		VVersion m_Maximum;
+	};
+
+	struct VMatch
+	{
+		std::size_t m_Position;
+		VXmlNode* m_pElement;
+	};
+
+	/// What a node notes while it lives. Nodes come and go by the thousands, so that they pass these on.
+	struct VNotes
+	{
+		std::vector<VDeclaration> m_Pending;
+		std::vector<VMatch> m_Matches;
+		/// Names of children that stand in the file and were declared or already told of; they point into the document.
+		std::vector<std::string_view> m_RecognisedChildren;
+		/// Where the names of the attributes begin that were asked for: no two attributes of an element have one name.
+		std::vector<const char*> m_RecognisedAttributes;
+	};
+
 public:
 	/// Shared by all nodes of a document; what the owner reads after the walk.
 	struct VGlobalInfo
@@ -27,7 +53,8 @@ public:
 		VMessages m_Warnings;
 		bool m_bStrictOrder = false;
 		/// The values of all xsd:ID attributes read so far; they point into the document.
-		std::set<std::string_view> m_Ids;
+		std::unordered_set<std::string_view> m_Ids;
+		std::vector<std::unique_ptr<VNotes>> m_SpareNotes;
 	};
 
 	/// The node above the document's elements. With strict order children must stand in the order of declaration.
@@ -52,35 +79,19 @@ public:
 	std::size_t GetErrorCount() const override { return m_pGlobal->m_Errors.GetCount(); }
 
 private:
-	struct VDeclaration
-	{
-		std::string m_Name;
-		std::uint32_t m_MinimumCount;
-		std::uint32_t m_MaximumCount;
-		VVersion m_Minimum;
-		VVersion m_Maximum;
-	};
-
-	struct VMatch
-	{
-		std::size_t m_Position;
-		VXmlNode* m_pElement;
-	};
-
 	VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pGlobal);
 
-	void Match(
-	    const VDeclaration& i_rDeclaration, bool i_bChoice, std::string& io_rChosen, std::vector<VMatch>& io_rMatches);
+	void Match(const VDeclaration& i_rDeclaration, bool i_bChoice, std::string& io_rChosen);
 
 	VXmlNode* m_pElement;
 	std::string m_Name;
 	std::shared_ptr<VGlobalInfo> m_pGlobal;
-	std::vector<VDeclaration> m_Pending;
+	std::unique_ptr<VNotes> m_pNotes;
 	std::size_t m_HighestPosition = 0;
-	/// Names of children that stand in the file and were declared or already told of; they point into the document.
-	std::vector<std::string_view> m_RecognisedChildren;
-	/// Where the names of the attributes begin that were asked for: no two attributes of an element have one name.
-	std::vector<const char*> m_RecognisedAttributes;
+	/// One bit for each attribute of the element, by its name: most that are asked for are not there.
+	std::uint64_t m_AttributeBits = 0;
+	/// Behind the attribute that was found last.
+	const VXmlAttribute* m_pNextAttribute;
 };
 
 } // namespace UtilsRapidXml

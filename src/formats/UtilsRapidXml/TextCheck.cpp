@@ -24,15 +24,27 @@ bool IsSpace(char i_Byte)
 	return i_Byte == ' ' || i_Byte == '\t' || i_Byte == '\n' || i_Byte == '\r';
 }
 
-bool StartsName(char i_Byte)
-{
-	const unsigned char lower = i_Byte | 0x20;
-	return (lower >= 'a' && lower <= 'z') || i_Byte == '_' || i_Byte == ':' || (i_Byte & 0x80);
-}
+constexpr unsigned char c_StartsName = 1;
+constexpr unsigned char c_ContinuesName = 2;
 
-bool ContinuesName(char i_Byte)
+/// What a byte may do in a name.
+constexpr auto c_NameBytes = []
 {
-	return StartsName(i_Byte) || (i_Byte >= '0' && i_Byte <= '9') || i_Byte == '-' || i_Byte == '.';
+	std::array<unsigned char, 256> bytes{};
+	for (int byte = 0; byte < 256; ++byte)
+	{
+		const int lower = byte | 0x20;
+		if ((lower >= 'a' && lower <= 'z') || byte == '_' || byte == ':' || byte >= 0x80)
+			bytes[byte] = c_StartsName | c_ContinuesName;
+		else if ((byte >= '0' && byte <= '9') || byte == '-' || byte == '.')
+			bytes[byte] = c_ContinuesName;
+	}
+	return bytes;
+}();
+
+bool IsInName(char i_Byte, unsigned char i_Place)
+{
+	return (c_NameBytes[static_cast<unsigned char>(i_Byte)] & i_Place) != 0;
 }
 
 /// What a quoted value must be looked at for: its end, the text's end, references, and what becomes a blank.
@@ -43,6 +55,19 @@ constexpr auto c_EndsPlain = []
 		ends[byte] = true;
 	return ends;
 }();
+
+/// Eight bytes of which none ends the plain part of a quoted value: most of any file.
+bool AllInsideValue(const char* i_pBytes)
+{
+	constexpr std::uint64_t c_Ones = 0x0101010101010101u;
+	constexpr std::uint64_t c_Highs = 0x8080808080808080u;
+	std::uint64_t word;
+	std::memcpy(&word, i_pBytes, sizeof(word));
+	const auto hasZero = [](std::uint64_t i_Word) { return (i_Word - c_Ones) & ~i_Word & c_Highs; };
+	const std::uint64_t controls = (word - c_Ones * 0x20) & ~word & c_Highs;
+	// "&" and "'" differ in the lowest bit.
+	return (controls | hasZero(word ^ c_Ones * '"') | hasZero((word | c_Ones) ^ c_Ones * '\'')) == 0;
+}
 
 class VTextCheck
 {
@@ -79,8 +104,9 @@ private:
 	std::string_view TakeName()
 	{
 		const char* const pBegin = m_p;
-		if (m_p != m_pEnd && StartsName(*m_p))
-			while (m_p != m_pEnd && ContinuesName(*m_p))
+		// The text ends with a zero byte.
+		if (IsInName(*m_p, c_StartsName))
+			while (IsInName(*m_p, c_ContinuesName))
 				++m_p;
 		return {pBegin, m_p};
 	}
@@ -216,6 +242,8 @@ bool VTextCheck::Attribute()
 	char* const pBegin = m_p;
 	for (;; ++m_p)
 	{
+		while (m_pEnd - m_p >= 8 && AllInsideValue(m_p))
+			m_p += 8;
 		while (!c_EndsPlain[static_cast<unsigned char>(*m_p)])
 			++m_p;
 		if (m_p == m_pEnd)
