@@ -100,205 +100,107 @@ class WriterMessage : public testing::TestWithParam<VRow>
 {
 };
 
-#define CHANGE [](VContent & c)
 const VRow c_Rows[] = {
-    {"Fine", [](VContent&) {}, {}}, {"NumberNotFinite", CHANGE{c.m_Subject.m_Segments[1].m_Joint.m_Mean[0] = c_NaN;
-} // namespace
-,
-{
-	"Could not stringify JointHinge node's MEAN attribute value."
-}
-} // namespace CoreOrlexQRTIO
-, {"NumberInfinite", CHANGE{c.m_ApplicationData.m_Segments[0].m_DrawTwist = HUGE_VAL;
-}
-,
-{
-	"Could not stringify Segment node's DRAW-TWIST attribute value."
-}
-}
-,
+    {"Fine", [](VContent&) {}, {}},
+    {"NumberNotFinite", [](VContent& c) { c.m_Subject.m_Segments[1].m_Joint.m_Mean[0] = c_NaN; },
+        {"Could not stringify JointHinge node's MEAN attribute value."}},
+    {"NumberInfinite", [](VContent& c) { c.m_ApplicationData.m_Segments[0].m_DrawTwist = HUGE_VAL; },
+        {"Could not stringify Segment node's DRAW-TWIST attribute value."}},
     {"EnumUnknown",
-        CHANGE{c.m_ApplicationData.m_Targets[0].m_DrawStyle =
-                   CoreOrlexTypes::VSubjectApplicationData::VTarget::EDrawStyle(7);
-}
-,
-{
-	"Could not stringify TargetLocalPointToWorldPoint node's DRAW-STYLE attribute value."
-}
-}
-, {"RequiredMarkerMissing", CHANGE{c.m_Subject.m_Markers[0].m_Missing = true;
-}
-,
-{
-	"Could not stringify Marker node's STATUS attribute value."
-}
-}
-, {"ExpressionWithBlanks", CHANGE{c.m_Subject.m_Segments[1].m_Bounds[0] = "1 + 2";
-}
-,
-{
-	"Node Segment attribute value 1 + 2 contains spaces."
-}
-}
-, {"QuotedNameWithBlanks", CHANGE{c.m_Subject.m_DynamicParameters[0].m_Name = "Global Scale";
-c.m_Subject.m_Segments[1].m_PreTranslation = {"'Global Scale'*2", "-'Global Scale'", ""};
-}
-, {}
-}
-, {"ExpressionDoesNotEvaluate", CHANGE{c.m_Subject.m_Segments[1].m_PreTranslation[0] = "x";
-}
-,
-{
-	"Parse Error at column 2: ID \"x\" was referenced but never declared"
-}
-}
-, {"ParameterNameWithBlanksAtItsEnds", CHANGE{c.m_Subject.m_DynamicParameters.push_back({" b", 0, 0, 1, true});
-}
-,
-{
-	"Parameter ' b' has blanks at the ends of its name."
-}
-}
-, {"NameWithControlByte", CHANGE{c.m_Subject.m_Segments[1].m_Name = "A\x01";
-}
-,
-{
-	"Segment node's NAME attribute has bytes that XML cannot hold.",
-	    "TargetLocalPointToWorldPoint node's SEGMENT attribute has bytes that XML cannot hold.",
-	    "TargetLocalRotationToWorldRotation node's SEGMENT attribute has bytes that XML cannot hold."
-}
-}
-, {"NameNotUtf8", CHANGE{c.m_Subject.m_Markers[0].m_Name = "\xFF";
-}
-,
-{
-	"Marker node's NAME attribute has bytes that XML cannot hold.",
-	    "TargetLocalPointToWorldPoint node's MARKER attribute has bytes that XML cannot hold."
-}
-}
-, {"GaussianWithoutCovariance", CHANGE{c.m_Subject.m_Targets[0].m_Type = VTarget::ELocalPointToWorldPointGaussian;
-}
-,
-{
-	"Target 'p' is Gaussian and has no covariance."
-}
-}
-, {"SegmentOutOfRange", CHANGE{c.m_Subject.m_Targets[0].m_SegmentIndices = {2};
-}
-,
-{
-	"TargetLocalPointToWorldPoint element refers to segment 2, which does not exist."
-}
-}
-, {"MarkerOutOfRange", CHANGE{c.m_Subject.m_Targets[0].m_MarkerIndices = {1};
-}
-,
-{
-	"TargetLocalPointToWorldPoint element refers to marker 1, which does not exist."
-}
-}
-, {"ObservationOutOfRange", CHANGE{c.m_Subject.m_Targets[1].m_RotationObservationIndices = {1};
-}
-,
-{
-	"Target 't' refers to a rotation observation that does not exist."
-}
-}
-,
+        [](VContent& c) {
+	        c.m_ApplicationData.m_Targets[0].m_DrawStyle =
+	            CoreOrlexTypes::VSubjectApplicationData::VTarget::EDrawStyle(7);
+        },
+        {"Could not stringify TargetLocalPointToWorldPoint node's DRAW-STYLE attribute value."}},
+    {"RequiredMarkerMissing", [](VContent& c) { c.m_Subject.m_Markers[0].m_Missing = true; },
+        {"Could not stringify Marker node's STATUS attribute value."}},
+    {"ExpressionWithBlanks", [](VContent& c) { c.m_Subject.m_Segments[1].m_Bounds[0] = "1 + 2"; },
+        {"Node Segment attribute value 1 + 2 contains spaces."}},
+    {"QuotedNameWithBlanks",
+        [](VContent& c)
+        {
+	        c.m_Subject.m_DynamicParameters[0].m_Name = "Global Scale";
+	        c.m_Subject.m_Segments[1].m_PreTranslation = {"'Global Scale'*2", "-'Global Scale'", ""};
+        },
+        {}},
+    {"ExpressionDoesNotEvaluate", [](VContent& c) { c.m_Subject.m_Segments[1].m_PreTranslation[0] = "x"; },
+        {"Parse Error at column 2: ID \"x\" was referenced but never declared"}},
+    {"ParameterNameWithBlanksAtItsEnds",
+        [](VContent& c) {
+	        c.m_Subject.m_DynamicParameters.push_back({" b", 0, 0, 1, true});
+        },
+        {"Parameter ' b' has blanks at the ends of its name."}},
+    {"NameWithControlByte", [](VContent& c) { c.m_Subject.m_Segments[1].m_Name = "A\x01"; },
+        {"Segment node's NAME attribute has bytes that XML cannot hold.",
+            "TargetLocalPointToWorldPoint node's SEGMENT attribute has bytes that XML cannot hold.",
+            "TargetLocalRotationToWorldRotation node's SEGMENT attribute has bytes that XML cannot hold."}},
+    {"NameNotUtf8", [](VContent& c) { c.m_Subject.m_Markers[0].m_Name = "\xFF"; },
+        {"Marker node's NAME attribute has bytes that XML cannot hold.",
+            "TargetLocalPointToWorldPoint node's MARKER attribute has bytes that XML cannot hold."}},
+    {"GaussianWithoutCovariance",
+        [](VContent& c) { c.m_Subject.m_Targets[0].m_Type = VTarget::ELocalPointToWorldPointGaussian; },
+        {"Target 'p' is Gaussian and has no covariance."}},
+    {"SegmentOutOfRange", [](VContent& c) { c.m_Subject.m_Targets[0].m_SegmentIndices = {2}; },
+        {"TargetLocalPointToWorldPoint element refers to segment 2, which does not exist."}},
+    {"MarkerOutOfRange", [](VContent& c) { c.m_Subject.m_Targets[0].m_MarkerIndices = {1}; },
+        {"TargetLocalPointToWorldPoint element refers to marker 1, which does not exist."}},
+    {"ObservationOutOfRange", [](VContent& c) { c.m_Subject.m_Targets[1].m_RotationObservationIndices = {1}; },
+        {"Target 't' refers to a rotation observation that does not exist."}},
     {"TargetsWithNothing",
-        CHANGE{for (VTarget & rTarget
-                    : c.m_Subject.m_Targets){const VTarget::ETargetType type = rTarget.m_Type;
-rTarget = {};
-rTarget.m_Type = type;
-}
-}
-,
-{
-	"Target 'p' has a state of another size than its type needs.", "Target 'p' has no marker.",
-	    "Target 'p' has no segment.", "Target 't' has a state of another size than its type needs.",
-	    "Target 't' has no rotation observation.", "Target 't' has no segment."
-}
-}
-, {"TargetOfNoType", CHANGE{c.m_Subject.m_Targets[0].m_Type = VTarget::EBadTargetType;
-}
-,
-{
-	"Target 'p' has a type that a file cannot hold."
-}
-}
-, {"HingeLikeWithoutOrientation", CHANGE{c.m_Subject.m_Targets[1].m_RotationCalibrationBehaviour = VTarget::EHingeLike;
-}
-,
-{
-	"Target 't' has a calibration behaviour and no orientation for it."
-}
-}
-, {"OrientationWithoutBehaviour", CHANGE{c.m_Subject.m_Targets[1].m_RotationTargetOrientation = {1, 2, 3};
-}
-, {},
-{
-	"Target 't' loses its calibration behaviour: a file has no word for it."
-}
-}
-, {"JointOfNoType", CHANGE{c.m_Subject.m_Segments[1].m_Joint.m_JointType = VJoint::EBadJointType;
-}
-,
-{
-	"Segment 'Arm' has a joint of a type that a file cannot hold."
-}
-}
-, {"RingOfParents", CHANGE{c.m_Subject.m_Segments[1].m_ParentSegmentIndex = 1;
-}
-,
-{
-	"1 segments cannot be reached from a root: their parents are missing or go round in a ring."
-}
-}
-, {"StickOutOfRange", CHANGE{c.m_ApplicationData.m_Sticks.push_back({0, {}, 5, {}});
-}
-,
-{
-	"Stick element refers to marker 5, which does not exist."
-}
-}
-, {"ConstraintsOfNoSize", CHANGE{c.m_Subject.m_TPoseConstraints = {1, 2, 3};
-}
-, {},
-{
-	"The 3 T-pose constraints do not fit the 7 degrees of freedom of the joints: none is written."
-}
-}
-, {"TargetOnSecondOfAName", CHANGE{c.m_Subject.m_Segments[1].m_Name = "Root";
-}
-, {},
-{
-	"TargetLocalPointToWorldPoint element refers to segment 1, but a reader finds segment 0, which has the same "
-	"name 'Root'.",
-	    "TargetLocalRotationToWorldRotation element refers to segment 1, but a reader finds segment 0, which has "
-	    "the same name 'Root'."
-}
-}
-, {"SubspaceOfPrunedJoint", CHANGE{c.m_Extras.m_DynamicSubspaces.push_back({"limb", "1", {"j"}, {1, 2}, {}});
-}
-, {},
-{
-	"Dynamic subspace 'limb' does not fit the joints any more: it is not written."
-}
-}
-,
+        [](VContent& c)
+        {
+	        for (VTarget& rTarget : c.m_Subject.m_Targets)
+	        {
+		        const VTarget::ETargetType type = rTarget.m_Type;
+		        rTarget = {};
+		        rTarget.m_Type = type;
+	        }
+        },
+        {"Target 'p' has a state of another size than its type needs.", "Target 'p' has no marker.",
+            "Target 'p' has no segment.", "Target 't' has a state of another size than its type needs.",
+            "Target 't' has no rotation observation.", "Target 't' has no segment."}},
+    {"TargetOfNoType", [](VContent& c) { c.m_Subject.m_Targets[0].m_Type = VTarget::EBadTargetType; },
+        {"Target 'p' has a type that a file cannot hold."}},
+    {"HingeLikeWithoutOrientation",
+        [](VContent& c) { c.m_Subject.m_Targets[1].m_RotationCalibrationBehaviour = VTarget::EHingeLike; },
+        {"Target 't' has a calibration behaviour and no orientation for it."}},
+    {"OrientationWithoutBehaviour",
+        [](VContent& c) {
+	        c.m_Subject.m_Targets[1].m_RotationTargetOrientation = {1, 2, 3};
+        },
+        {}, {"Target 't' loses its calibration behaviour: a file has no word for it."}},
+    {"JointOfNoType", [](VContent& c) { c.m_Subject.m_Segments[1].m_Joint.m_JointType = VJoint::EBadJointType; },
+        {"Segment 'Arm' has a joint of a type that a file cannot hold."}},
+    {"RingOfParents", [](VContent& c) { c.m_Subject.m_Segments[1].m_ParentSegmentIndex = 1; },
+        {"1 segments cannot be reached from a root: their parents are missing or go round in a ring."}},
+    {"StickOutOfRange",
+        [](VContent& c) {
+	        c.m_ApplicationData.m_Sticks.push_back({0, {}, 5, {}});
+        },
+        {"Stick element refers to marker 5, which does not exist."}},
+    {"ConstraintsOfNoSize",
+        [](VContent& c) {
+	        c.m_Subject.m_TPoseConstraints = {1, 2, 3};
+        },
+        {}, {"The 3 T-pose constraints do not fit the 7 degrees of freedom of the joints: none is written."}},
+    {"TargetOnSecondOfAName", [](VContent& c) { c.m_Subject.m_Segments[1].m_Name = "Root"; }, {},
+        {"TargetLocalPointToWorldPoint element refers to segment 1, but a reader finds segment 0, which has the same "
+         "name 'Root'.",
+            "TargetLocalRotationToWorldRotation element refers to segment 1, but a reader finds segment 0, which has "
+            "the same name 'Root'."}},
+    {"SubspaceOfPrunedJoint",
+        [](VContent& c) {
+	        c.m_Extras.m_DynamicSubspaces.push_back({"limb", "1", {"j"}, {1, 2}, {}});
+        },
+        {}, {"Dynamic subspace 'limb' does not fit the joints any more: it is not written."}},
     {"ChainTooDeep",
-        CHANGE{
-            for (std::uint32_t i = 2; i < 509; ++i) c.m_Subject.m_Segments.emplace_back().m_ParentSegmentIndex = i - 1;
-}
-,
-{
-	"A chain of 509 segments is longer than a file can hold, which is 508."
-}
-}
-,
-}
-;
-#undef CHANGE
+        [](VContent& c)
+        {
+	        for (std::uint32_t i = 2; i < 509; ++i)
+		        c.m_Subject.m_Segments.emplace_back().m_ParentSegmentIndex = i - 1;
+        },
+        {"A chain of 509 segments is longer than a file can hold, which is 508."}},
+};
 
 INSTANTIATE_TEST_SUITE_P(
     Writer, WriterMessage, testing::ValuesIn(c_Rows), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
