@@ -23,6 +23,7 @@ struct VConvertSettings
 
 EExitStatus Convert(const VConvertSettings& i_rSettings)
 {
+	CheckOutput(i_rSettings.m_Out);
 	const VSubjectFile file = ReadSubjectFile(i_rSettings.m_In);
 	const CoreOrlexTypes::VSubjectRecord& rRecord = file.m_Record;
 	const auto losses = CoreOrlexQRTIO::ListVersionLosses(

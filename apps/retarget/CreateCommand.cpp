@@ -1,6 +1,7 @@
 #include "retarget/Commands.h"
 #include "retarget/Edits.h"
 #include "retarget/Session.h"
+#include "retarget/SubjectFile.h"
 
 #include "DebugServices/GlobalLog.h"
 
@@ -27,6 +28,7 @@ bool MatchesFilePose(const VEdits& i_rEdits)
 
 EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 {
+	CheckOutput(i_rSettings.m_Out, {i_rSettings.m_Fbx, i_rSettings.m_Source});
 	VSession session;
 	// The target subject takes the source's name when it is made.
 	if (!i_rSettings.m_Source.empty())

@@ -1,6 +1,7 @@
 #include "retarget/Commands.h"
 #include "retarget/Edits.h"
 #include "retarget/Session.h"
+#include "retarget/SubjectFile.h"
 
 namespace CommandLine
 {
@@ -16,6 +17,7 @@ struct VEditSettings
 
 EExitStatus Edit(const VEditSettings& i_rSettings, const VEdits& i_rEdits)
 {
+	CheckOutput(i_rSettings.m_Out, {i_rSettings.m_Source});
 	VSession session;
 	session.LoadTarget(i_rSettings.m_In);
 	if (!i_rSettings.m_Source.empty())

@@ -12,13 +12,21 @@
 #include "RetargetSetupDocument/FilePath.h"
 #include "RetargetSetupDocument/Identity.h"
 
+#include <boost/filesystem/operations.hpp>
+
 namespace CommandLine
 {
+namespace
+{
+
+constexpr const char* c_LegacyExtension = ".qrx";
+
+} // namespace
 
 VSubjectFile ReadSubjectFile(const std::string& i_rPath)
 {
 	VSubjectFile file;
-	if (RetargetSetup::FileExtension(i_rPath) == ".qrx")
+	if (RetargetSetup::FileExtension(i_rPath) == c_LegacyExtension)
 	{
 		VSession session;
 		session.LoadTarget(i_rPath);
@@ -32,6 +40,19 @@ VSubjectFile ReadSubjectFile(const std::string& i_rPath)
 	        file.m_Record.m_SubjectParametrised, file.m_Record.m_SubjectApplicationData, file.m_Extras))
 		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a skeleton file");
 	return file;
+}
+
+void CheckOutput(const std::string& i_rPath, const std::vector<std::string>& i_rInputs)
+{
+	if (RetargetSetup::FileExtension(i_rPath) == c_LegacyExtension)
+		throw VCommandError(
+		    EWrongUsage, "\"" + i_rPath + "\": .qrx is the legacy text form, which is only read; save as .qrr");
+	for (const std::string& rInput : i_rInputs)
+	{
+		boost::system::error_code error;
+		if (boost::filesystem::equivalent(i_rPath, rInput, error) && !error)
+			throw VCommandError(EWrongUsage, "\"" + i_rPath + "\" is an input that saving there would destroy");
+	}
 }
 
 void WriteSubjectFile(const std::string& i_rPath, const CoreOrlexTypes::VSubjectParametrised& i_rSubject,

@@ -4,6 +4,7 @@
 #include "CoreOrlexTypes/SubjectRecord.h"
 
 #include <string>
+#include <vector>
 
 namespace CommandLine
 {
@@ -18,6 +19,10 @@ struct VSubjectFile
 /// Reads a skeleton file as it stands, or a legacy text file (.qrx) as the document takes it in. Throws VCommandError
 /// with EBadInput if that fails.
 VSubjectFile ReadSubjectFile(const std::string& i_rPath);
+
+/// Refuses, with EWrongUsage, an output that would replace one of these inputs by a file of another kind, and one whose
+/// extension would make it be read as legacy text.
+void CheckOutput(const std::string& i_rPath, const std::vector<std::string>& i_rInputs = {});
 
 /// Writes a skeleton file at a version of the format, to standard output if the path is "-". Throws VCommandError with
 /// EBadOutput if that fails; a file that stood there then stays.

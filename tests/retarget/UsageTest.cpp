@@ -57,6 +57,25 @@ TEST(Usage, WrongWords)
 	    folder);
 }
 
+TEST(Usage, OutputsThatWouldDestroy)
+{
+	const VScratchFolder folder;
+	std::filesystem::copy(c_Fbx, folder / "hero.fbx");
+	std::filesystem::copy(c_Performer, folder / "performer.qrs");
+	RunRows(
+	    {
+	        {"the character", {"create", "--fbx", "hero.fbx", "-o", "./hero.fbx"}, 2, "",
+	            "\"./hero.fbx\" is an input that saving there would destroy"},
+	        {"the performer", {"create", "--fbx", "hero.fbx", "--source", "performer.qrs", "-o", "performer.qrs"}, 2,
+	            "", "\"performer.qrs\" is an input"},
+	        {"legacy name", {"create", "--fbx", "hero.fbx", "-o", "hero.qrx"}, 2, "",
+	            "\"hero.qrx\": .qrx is the legacy text form, which is only read; save as .qrr"},
+	        {"legacy name", {"convert", "performer.qrs", "x.qrx"}, 2, "", "save as .qrr"},
+	    },
+	    folder);
+	EXPECT_EQ(std::filesystem::file_size(folder / "hero.fbx"), std::filesystem::file_size(c_Fbx));
+}
+
 TEST(Usage, EditsThatNameWhatIsNotThere)
 {
 	const VScratchFolder folder;
