@@ -45,6 +45,8 @@ protected:
 
 	const boost::filesystem::path m_Folder =
 	    boost::filesystem::temp_directory_path() / boost::filesystem::unique_path("document-%%%%%%%%");
+	/// Keeps what the readers tell of our own files out of the tests' output.
+	VLogRecorder m_Quiet;
 	InMemoryHost::VPluginContext m_Host;
 	VRetargetSetup m_Document{m_Host.GetDispatcher(), m_Host.GetFrameFactory(), m_Host.GetItemFactory()};
 	int m_Changes = 0;
