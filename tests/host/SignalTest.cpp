@@ -101,4 +101,18 @@ TEST(Signal, ACallbackMayConnectDisconnectAndFireAgain)
 	EXPECT_EQ(inner, 1) << "connected during the outer firing: called by the inner one alone";
 }
 
+TEST(Signal, APostThatNeverRunsDoesNotKeepTheDispatcher)
+{
+	NVX::VSignal<> signal;
+	auto pQueue = std::make_shared<VQueue>();
+	signal.Connect([] {}, pQueue).Disconnect();
+	NVX::VConnection connection = signal.Connect([] {}, pQueue);
+	signal.Fire();
+	connection.Disconnect();
+	signal.Fire();
+	const std::weak_ptr<VQueue> pWeak = pQueue;
+	pQueue.reset();
+	EXPECT_TRUE(pWeak.expired());
+}
+
 } // namespace

@@ -3,7 +3,6 @@
 #include "NVX/Shared.h"
 #include "TesselPluginInterface/IDispatcher.h"
 
-#include <algorithm>
 #include <atomic>
 #include <functional>
 #include <memory>
@@ -51,21 +50,22 @@ public:
 	/// called at once, on the thread that fires.
 	VConnection Connect(VCallback i_Callback, std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher = {})
 	{
-		auto pEntry = std::make_shared<VEntry>(std::move(i_Callback), std::move(i_pDispatcher));
-		VConnection connection{std::shared_ptr<std::atomic<bool>>(pEntry, &pEntry->m_bAlive)};
+		auto pCall = std::make_shared<VCall>(std::move(i_Callback));
+		VConnection connection{std::shared_ptr<std::atomic<bool>>(pCall, &pCall->m_bAlive)};
 		const std::lock_guard lock(m_Mutex);
-		m_Entries.push_back(std::move(pEntry));
+		m_Entries.push_back({std::move(pCall), std::move(i_pDispatcher)});
 		return connection;
 	}
 
 	void Fire(const VArguments&... i_rArguments)
 	{
-		for (const std::shared_ptr<VEntry>& pEntry : LivingEntries())
+		for (const VEntry& rEntry : LivingEntries())
 		{
-			if (pEntry->m_pDispatcher)
-				pEntry->m_pDispatcher->Post([pEntry, i_rArguments...] { Call(*pEntry, i_rArguments...); });
+			// What is posted does not own the dispatcher: the two would keep each other if it never ran.
+			if (rEntry.m_pDispatcher)
+				rEntry.m_pDispatcher->Post([pCall = rEntry.m_pCall, i_rArguments...] { pCall->Run(i_rArguments...); });
 			else
-				Call(*pEntry, i_rArguments...);
+				rEntry.m_pCall->Run(i_rArguments...);
 		}
 		const std::lock_guard lock(m_Mutex);
 		Purge();
@@ -75,33 +75,35 @@ public:
 	std::size_t Count() { return LivingEntries().size(); }
 
 private:
-	struct VEntry
+	struct VCall
 	{
-		VEntry(VCallback i_Callback, std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher)
-		    : m_Callback(std::move(i_Callback)), m_pDispatcher(std::move(i_pDispatcher))
+		explicit VCall(VCallback i_Callback) : m_Callback(std::move(i_Callback)) {}
+
+		void Run(const VArguments&... i_rArguments)
 		{
+			if (!m_bAlive.load())
+				return;
+			try
+			{
+				m_Callback(i_rArguments...);
+			}
+			catch (const VDeregisterWeakCallbackException&)
+			{
+				m_bAlive.store(false);
+			}
 		}
 
 		const VCallback m_Callback;
-		const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
 		std::atomic<bool> m_bAlive{true};
 	};
 
-	static void Call(VEntry& i_rEntry, const VArguments&... i_rArguments)
+	struct VEntry
 	{
-		if (!i_rEntry.m_bAlive.load())
-			return;
-		try
-		{
-			i_rEntry.m_Callback(i_rArguments...);
-		}
-		catch (const VDeregisterWeakCallbackException&)
-		{
-			i_rEntry.m_bAlive.store(false);
-		}
-	}
+		std::shared_ptr<VCall> m_pCall;
+		std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
+	};
 
-	std::vector<std::shared_ptr<VEntry>> LivingEntries()
+	std::vector<VEntry> LivingEntries()
 	{
 		const std::lock_guard lock(m_Mutex);
 		Purge();
@@ -110,11 +112,11 @@ private:
 
 	void Purge()
 	{
-		std::erase_if(m_Entries, [](const auto& i_rpEntry) { return !i_rpEntry->m_bAlive.load(); });
+		std::erase_if(m_Entries, [](const VEntry& i_rEntry) { return !i_rEntry.m_pCall->m_bAlive.load(); });
 	}
 
 	std::mutex m_Mutex;
-	std::vector<std::shared_ptr<VEntry>> m_Entries;
+	std::vector<VEntry> m_Entries;
 };
 
 } // namespace NVX
