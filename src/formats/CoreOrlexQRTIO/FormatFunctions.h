@@ -38,14 +38,15 @@ struct VReading
 	std::unordered_set<std::uint32_t> m_RotationIds{};
 };
 
-/// A segment while its element is read.
+/// A segment while its element is read. The records stand at the end of their lists already, and go if there is an
+/// error.
 struct VSegmentInHand
 {
-	CoreOrlexTypes::VSubjectParametrised::VSegment m_Segment;
-	CoreOrlexTypes::VSubjectApplicationData::VSegment m_ApplicationData;
-	VSubjectQRTExtras::VSegment m_Extras;
+	CoreOrlexTypes::VSubjectParametrised::VSegment& m_rSegment;
+	CoreOrlexTypes::VSubjectApplicationData::VSegment& m_rApplicationData;
+	VSubjectQRTExtras::VSegment& m_rExtras;
 	/// The joint's share of the T-pose constraints.
-	std::vector<double> m_T;
+	std::vector<double> m_T{};
 };
 
 /// The skeleton format, one function for each element. Run over a VReaderNode they read a file, over a VSchemaNode they

@@ -54,9 +54,9 @@ void ReadExpressionTriple(
 void FormatJointTemplate(INode& io_rNode, VSegmentInHand& io_rSegment, VTold& io_rTold)
 {
 	namespace Table = Format::JointTemplate;
-	VSubjectParametrised::VSegment& rSegment = io_rSegment.m_Segment;
+	VSubjectParametrised::VSegment& rSegment = io_rSegment.m_rSegment;
 	VSubjectParametrised::VJoint& rJoint = rSegment.m_Joint;
-	VSubjectQRTExtras::VJoint& rExtras = io_rSegment.m_Extras.m_Joint;
+	VSubjectQRTExtras::VJoint& rExtras = io_rSegment.m_rExtras.m_Joint;
 	const std::size_t stateSize = CoreOrlexTypes::StateSize(rJoint.m_JointType);
 	const std::size_t covarianceSize = CoreOrlexTypes::CovarianceSize(rJoint.m_JointType);
 
@@ -89,9 +89,9 @@ void FormatJoint(INode& io_rNode, VSegmentInHand& io_rSegment)
 	if (!pElement)
 		return;
 	using VJoint = VSubjectParametrised::VJoint;
-	VSubjectParametrised::VSegment& rSegment = io_rSegment.m_Segment;
+	VSubjectParametrised::VSegment& rSegment = io_rSegment.m_rSegment;
 	VJoint& rJoint = rSegment.m_Joint;
-	VSubjectQRTExtras::VJoint& rExtras = io_rSegment.m_Extras.m_Joint;
+	VSubjectQRTExtras::VJoint& rExtras = io_rSegment.m_rExtras.m_Joint;
 	const VJoint::EJointType type = rJoint.m_JointType = pElement->m_Type;
 	const std::size_t stateSize = CoreOrlexTypes::StateSize(type);
 	const std::size_t covarianceSize = CoreOrlexTypes::CovarianceSize(type);
@@ -121,8 +121,8 @@ void FormatJoint(INode& io_rNode, VSegmentInHand& io_rSegment)
 		    UtilsRapidXml::ReadListWithPlaceholders(io_rNode, Table::c_T, stateSize, io_rSegment.m_T, placeholders);
 		ReadAttribute(io_rNode, Table::c_Signs, rExtras.m_Signs);
 		ReadAttribute(io_rNode, Table::c_Labels, rExtras.m_Labels);
-		io_rSegment.m_ApplicationData.m_Joint.m_Signs = rExtras.m_Signs;
-		io_rSegment.m_ApplicationData.m_Joint.m_Labels = rExtras.m_Labels;
+		io_rSegment.m_rApplicationData.m_Joint.m_Signs = rExtras.m_Signs;
+		io_rSegment.m_rApplicationData.m_Joint.m_Labels = rExtras.m_Labels;
 		ReadList(io_rNode, Table::c_RangeCentringState, stateSize, rJoint.m_RangeCentringState);
 		ReadList(io_rNode, Table::c_RangeMatrix, covarianceSize, rJoint.m_RangeMatrix);
 	}
@@ -134,7 +134,7 @@ void FormatJoint(INode& io_rNode, VSegmentInHand& io_rSegment)
 
 	if (type == VJoint::EFree || type == VJoint::EBall)
 		ReadAttribute(io_rNode, Table::c_EulerOrder, EnumTables::EulerOrder(),
-		    io_rSegment.m_ApplicationData.m_Joint.m_EulerOrder);
+		    io_rSegment.m_rApplicationData.m_Joint.m_EulerOrder);
 	else if (type == VJoint::EHardySpicer)
 		ReadReals(io_rNode, Table::c_AxisPair, rExtras.m_Axis);
 	else if (type == VJoint::EHinge || type == VJoint::ESlider)

@@ -20,9 +20,11 @@ using UtilsRapidXml::ReadAttribute;
 {
 	namespace Table = Format::Segment;
 	const std::size_t errors = io_rNode.GetErrorCount();
-	VSegmentInHand inHand;
+	auto& rSegments = io_rReading.m_rSubject.m_Segments;
+	VSegmentInHand inHand{rSegments.emplace_back(), io_rReading.m_rApplicationData.m_Segments.emplace_back(),
+	    io_rReading.m_rExtras.m_Segments.emplace_back()};
 	auto& [rSegment, rApplicationData, rExtras, rT] = inHand;
-	rSegment.m_SegmentIndex = static_cast<std::uint32_t>(io_rReading.m_rSubject.m_Segments.size());
+	rSegment.m_SegmentIndex = static_cast<std::uint32_t>(rSegments.size() - 1);
 	rSegment.m_ParentSegmentIndex = i_Parent;
 	rSegment.m_TreeDepth = i_Depth;
 
@@ -57,14 +59,16 @@ using UtilsRapidXml::ReadAttribute;
 	ReadAttribute(io_rNode, Table::c_DrawShading, EnumTables::DrawShading(), rApplicationData.m_DrawShading);
 
 	if (i_bParentDropped || io_rNode.GetErrorCount() != errors)
+	{
+		rSegments.pop_back();
+		io_rReading.m_rApplicationData.m_Segments.pop_back();
+		io_rReading.m_rExtras.m_Segments.pop_back();
 		return false;
+	}
 	rExtras.m_Name = rSegment.m_Name;
 	io_rReading.m_SegmentsByName.emplace(rSegment.m_Name, rSegment.m_SegmentIndex);
 	std::vector<double>& rConstraints = io_rReading.m_rSubject.m_TPoseConstraints;
 	rConstraints.insert(rConstraints.end(), rT.begin(), rT.end());
-	io_rReading.m_rSubject.m_Segments.push_back(std::move(rSegment));
-	io_rReading.m_rApplicationData.m_Segments.push_back(std::move(rApplicationData));
-	io_rReading.m_rExtras.m_Segments.push_back(std::move(rExtras));
 	return true;
 }
 

@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <unordered_set>
 
 namespace CoreOrlexQRTIO
 {
@@ -45,6 +46,37 @@ const VAxesTexts* FindAxesTexts(VJoint::EJointType i_Type)
 	const auto* const pFound = std::ranges::find(s_Texts, i_Type, &VAxesTexts::m_Type);
 	return pFound == std::ranges::end(s_Texts) ? nullptr : pFound;
 }
+
+/// Tells whether expressions evaluate. Most of a file are numbers, and numbers times one and the same parameter: what
+/// stands behind the first number is parsed once.
+class VExpressionCheck
+{
+public:
+	explicit VExpressionCheck(VDynamicExpressionParserSimple& io_rParser) : m_rParser(io_rParser) {}
+
+	bool IsFine(std::string_view i_Expression, std::string& o_rError)
+	{
+		if (i_Expression.empty() || IsPlainNumber(i_Expression))
+			return true;
+		const std::string_view tail =
+		    i_Expression.substr(std::min(i_Expression.find_first_of("+-*/", 1), i_Expression.size()));
+		const std::string_view number = i_Expression.substr(0, i_Expression.size() - tail.size());
+		// Zero may make a term vanish that would be refused otherwise.
+		const bool bKnowable =
+		    !tail.empty() && IsPlainNumber(number) && number.find_first_of("123456789") != std::string_view::npos;
+		if (bKnowable && m_FineTails.contains(std::string(tail)))
+			return true;
+		double value = 0.0;
+		const bool bFine = m_rParser.Evaluate(i_Expression, value, o_rError);
+		if (bFine && bKnowable)
+			m_FineTails.emplace(tail);
+		return bFine;
+	}
+
+private:
+	VDynamicExpressionParserSimple& m_rParser;
+	std::unordered_set<std::string> m_FineTails;
+};
 
 /// Files up to 3.1 tell where the segment stands in the joint's frame.
 void TakePostPose(VDynamicExpressionParserSimple& io_rParser, const VSubjectQRTExtras::VJoint& i_rExtras,
@@ -99,16 +131,15 @@ bool CheckExpressions(
 		io_rErrors.push_back("Error parsing subject static parameter expressions");
 	io_rErrors.insert(io_rErrors.end(), parameterErrors.begin(), parameterErrors.end());
 
+	VExpressionCheck expressions(io_rParser);
 	std::string error;
-	double value = 0.0;
 	for (std::size_t i = 0; i < rSubject.m_Segments.size(); ++i)
 	{
 		const VSubjectParametrised::VSegment& rSegment = rSubject.m_Segments[i];
 		const VSubjectQRTExtras::VJoint& rExtras = i_rReading.m_rExtras.m_Segments[i].m_Joint;
 		const auto check = [&](const std::string& i_rExpression)
 		{
-			if (i_rExpression.empty() || IsPlainNumber(i_rExpression)
-			    || io_rParser.Evaluate(i_rExpression, value, error))
+			if (expressions.IsFine(i_rExpression, error))
 				return;
 			bFine = false;
 			io_rWarnings.push_back(
@@ -131,7 +162,7 @@ bool CheckExpressions(
 
 	for (std::size_t i = 0; i < rSubject.m_Targets.size(); ++i)
 		for (const std::string& rExpression : rSubject.m_Targets[i].m_StateExpressions)
-			if (!IsPlainNumber(rExpression) && !io_rParser.Evaluate(rExpression, value, error))
+			if (!expressions.IsFine(rExpression, error))
 				io_rWarnings.push_back((boost::format("Target '%1%' has the invalid state expression '%2%': %3%")
 				    % i_rReading.m_rApplicationData.m_Targets[i].m_Name % rExpression % error)
 				                           .str());

@@ -76,9 +76,13 @@ VReaderNode::~VReaderNode()
 		if (!Contains(m_pNotes->m_RecognisedChildren, name) && told.insert(name).second)
 			m_pGlobal->m_Warnings.Add("Ignoring unrecognised element type: %1%", [&] { return Path(pChild); });
 	}
+	// Mostly all were asked for, in their order.
 	const std::vector<const char*>& rRecognised = m_pNotes->m_RecognisedAttributes;
+	auto next = rRecognised.begin();
 	for (const auto* pAttribute = m_pElement->first_attribute(); pAttribute; pAttribute = pAttribute->next_attribute())
-		if (std::find(rRecognised.begin(), rRecognised.end(), pAttribute->name()) == rRecognised.end())
+		if (next != rRecognised.end() && *next == pAttribute->name())
+			++next;
+		else if (std::find(rRecognised.begin(), rRecognised.end(), pAttribute->name()) == rRecognised.end())
 			m_pGlobal->m_Warnings.Add("Ignoring unrecognised attribute: %1%",
 			    [&] { return (Path(m_pElement) += '/') += UtilsRapidXml::Name(pAttribute); });
 	m_pNotes->m_Pending.clear();
