@@ -106,6 +106,8 @@ void VSession::Save(const std::string& i_rPath)
 	}
 	if (m_pDocument->SaveTargetSubject(i_rPath) != NVX::Status::c_Success)
 		throw VCommandError(EBadOutput, "\"" + i_rPath + "\" could not be written");
+	NVX_LOG(c_pCategory, NVX::ELogInformation, "Saved \"%1%\": %2% segments, %3% targets", i_rPath,
+	    Target().m_Segments.size(), Target().m_Targets.size());
 }
 
 const CoreOrlexTypes::VSubjectParametrised& VSession::Source(const std::string& i_rWhatFor) const
