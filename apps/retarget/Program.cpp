@@ -82,6 +82,15 @@ std::string SeeHelp(const CLI::App& i_rApp)
 	return "see \"retarget " + (i_rApp.get_parent() ? i_rApp.get_name() + " " : "") + "--help\"";
 }
 
+/// The closest of a few fixed names, if it can be a slip of the hand.
+std::string Meant(const std::string& i_rWord, const std::vector<std::string>& i_rNames)
+{
+	const std::vector<std::string> closest = Closest(i_rWord, i_rNames, 1);
+	if (closest.empty() || EditDistance(i_rWord, closest.front()) > std::max<std::size_t>(1, i_rWord.size() / 3))
+		return "";
+	return "; did you mean \"" + closest.front() + "\"?";
+}
+
 /// The first word of the line that no option and no command takes, with what may have been meant. Empty if there is
 /// none.
 std::string DescribeUnexpected(const CLI::App& i_rApp)
@@ -102,7 +111,7 @@ std::string DescribeUnexpected(const CLI::App& i_rApp)
 			for (const std::string& rName : pOption->get_lnames())
 				names.push_back("--" + rName);
 		std::string text =
-		    "there is no option \"" + rWord + "\"" + DidYouMean(rWord.substr(0, rWord.find('=')), names, 1) + "; ";
+		    "there is no option \"" + rWord + "\"" + Meant(rWord.substr(0, rWord.find('=')), names) + "; ";
 		if (rWord[1] != '-')
 			text += "put -- before a text that begins with -; ";
 		return text + SeeHelp(i_rApp);
@@ -112,7 +121,7 @@ std::string DescribeUnexpected(const CLI::App& i_rApp)
 	for (const CLI::App* pCommand :
 	    i_rApp.get_subcommands([](const CLI::App* i_pApp) { return !i_pApp->get_group().empty(); }))
 		names.push_back(pCommand->get_name());
-	return "there is no command \"" + rWord + "\"" + DidYouMean(rWord, names, 1) + "; " + SeeHelp(i_rApp);
+	return "there is no command \"" + rWord + "\"" + Meant(rWord, names) + "; " + SeeHelp(i_rApp);
 }
 
 const CLI::App& ParsedApp(const CLI::App& i_rApp)

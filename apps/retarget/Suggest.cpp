@@ -66,9 +66,9 @@ std::vector<std::string> Closest(std::string_view i_Text, const std::vector<std:
 	return closest;
 }
 
-std::string DidYouMean(std::string_view i_Text, const std::vector<std::string>& i_rNames, std::size_t i_Count)
+std::string DidYouMean(std::string_view i_Text, const std::vector<std::string>& i_rNames)
 {
-	const std::vector<std::string> closest = Closest(i_Text, i_rNames, i_Count);
+	const std::vector<std::string> closest = Closest(i_Text, i_rNames);
 	if (closest.empty())
 		return "";
 	std::string text = "; did you mean ";

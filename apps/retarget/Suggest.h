@@ -17,6 +17,6 @@ std::vector<std::string> Closest(
     std::string_view i_Text, const std::vector<std::string>& i_rNames, std::size_t i_Count = 3);
 
 /// `; did you mean "A", "B" or "C"?`, or nothing if there are no names.
-std::string DidYouMean(std::string_view i_Text, const std::vector<std::string>& i_rNames, std::size_t i_Count = 3);
+std::string DidYouMean(std::string_view i_Text, const std::vector<std::string>& i_rNames);
 
 } // namespace CommandLine

@@ -6,8 +6,8 @@
 namespace
 {
 
-/// What the documentation shows is what a user gets: each "$ command" of its console blocks, with the lines behind it.
-TEST(Session, TheDocumentedOneIsReal)
+/// What a page shows is what a user gets: each "$ command" of its console blocks, with the lines behind it.
+void RunSession(const std::string& i_rPage, std::size_t i_Steps)
 {
 	struct VStep
 	{
@@ -15,7 +15,7 @@ TEST(Session, TheDocumentedOneIsReal)
 		std::string m_Output;
 	};
 	std::vector<VStep> steps;
-	std::ifstream page(RETARGET_SOURCE "/docs/command-line.md");
+	std::ifstream page(RETARGET_SOURCE "/" + i_rPage);
 	bool bConsole = false;
 	bool bContinued = false;
 	for (std::string line; std::getline(page, line);)
@@ -30,7 +30,7 @@ TEST(Session, TheDocumentedOneIsReal)
 			steps.back().m_Output += line + "\n";
 		bContinued = bConsole && line.ends_with("\\");
 	}
-	ASSERT_GT(steps.size(), 8u);
+	ASSERT_GE(steps.size(), i_Steps) << i_rPage;
 
 	const VScratchFolder folder;
 	std::filesystem::create_directory_symlink(RETARGET_SOURCE "/demo", folder / "demo");
@@ -42,6 +42,16 @@ TEST(Session, TheDocumentedOneIsReal)
 		std::system(("bash '" + (folder / "step").string() + "' > '" + (folder / "out").string() + "' 2>&1").c_str());
 		EXPECT_EQ(folder.Read("out"), rStep.m_Output) << rStep.m_Command;
 	}
+}
+
+TEST(Session, OfTheCommandLinesPage)
+{
+	RunSession("docs/command-line.md", 12);
+}
+
+TEST(Session, OfTheFirstScreen)
+{
+	RunSession("README.md", 2);
 }
 
 } // namespace

@@ -41,7 +41,7 @@ TEST(Suggest, NamesTheClosestFirst)
 	const std::vector<std::string> names{"Hips", "LeftArm", "RightArm", "LeftForeArm", "Head", "LeftArm"};
 	EXPECT_EQ(Closest("LeftAmr", names), (std::vector<std::string>{"LeftArm", "RightArm", "LeftForeArm"}));
 	EXPECT_EQ(Closest("Character1:Hips", names, 1), (std::vector<std::string>{"Hips"}));
-	EXPECT_EQ(DidYouMean("hed", names, 1), "; did you mean \"Head\"?");
+	EXPECT_EQ(DidYouMean("hed", {"Head", "Hips"}), "; did you mean \"Head\" or \"Hips\"?");
 	EXPECT_EQ(DidYouMean("hed", {}), "");
 }
 
