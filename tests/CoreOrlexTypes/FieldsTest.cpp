@@ -1,5 +1,7 @@
 #include "RandomValue.h"
 
+#include "CoreOrlexTypes/Difference.h"
+
 #include <gtest/gtest.h>
 
 #include <limits>
@@ -129,6 +131,23 @@ TEST(Fields, DefaultsOfElements)
 	EXPECT_EQ(parameter.m_Prior, std::numeric_limits<double>::max());
 	EXPECT_EQ(VColour{}, ColourFromPattern(0xFF5D5D5Du));
 	EXPECT_EQ(VSubjectApplicationData{}.m_SkinColourA, ColourFromPattern(0));
+}
+
+TEST(FirstDifference, NamesThePlace)
+{
+	VSubjectRecord record;
+	record.m_SubjectParametrised.m_Segments.resize(4);
+	record.m_SubjectParametrised.m_Segments[3].m_Joint.m_BindPose = {0.0, std::numeric_limits<double>::quiet_NaN()};
+	VSubjectRecord other = record;
+	EXPECT_EQ(FirstDifference(record, other), "");
+	other.m_SubjectApplicationData.m_Colour.m_Alpha = 1;
+	EXPECT_EQ(FirstDifference(record, other), "SubjectApplicationData.Colour.Alpha");
+	other.m_SubjectParametrised.m_Segments[3].m_Joint.m_BindPose[1] = 0.0;
+	EXPECT_EQ(FirstDifference(record, other), "SubjectParametrised.Segments[3].Joint.BindPose[1]");
+	other.m_SubjectParametrised.m_Segments[2].m_PreRotation[1] = "0.0";
+	EXPECT_EQ(FirstDifference(record, other), "SubjectParametrised.Segments[2].PreRotation[1]");
+	other.m_SubjectParametrised.m_Segments.pop_back();
+	EXPECT_EQ(FirstDifference(record, other), "SubjectParametrised.Segments");
 }
 
 } // namespace

@@ -1,5 +1,6 @@
 // The document from end to end on files: an FBX file and a performer in, a retarget subject out and in again.
 
+#include "CoreOrlexQRTIO/FileDifference.h"
 #include "TestDocument.h"
 
 #include "CoreOrlexTypes/SubjectRecord.h"
@@ -26,27 +27,6 @@ int IndexOf(const VSubjectParametrised& i_rSubject, const std::string& i_rName)
 	const auto found = std::find_if(i_rSubject.m_Segments.begin(), i_rSubject.m_Segments.end(),
 	    [&i_rName](const auto& i_rSegment) { return i_rSegment.m_Name == i_rName; });
 	return found == i_rSubject.m_Segments.end() ? -1 : int(found - i_rSubject.m_Segments.begin());
-}
-
-/// Without what a file does not keep: the ids of markers and rotation observations, and the order of the latter.
-VSubjectParametrised AsFilesKeepIt(VSubjectParametrised i_Subject)
-{
-	for (auto& rMarker : i_Subject.m_Markers)
-		rMarker.m_MarkerId = 0;
-	std::vector<std::string> names;
-	for (auto& rRotation : i_Subject.m_Rotations)
-	{
-		rRotation.m_RotationId = 0;
-		names.push_back(rRotation.m_Name);
-	}
-	std::sort(names.begin(), names.end());
-	for (auto& rTarget : i_Subject.m_Targets)
-		for (auto& rIndex : rTarget.m_RotationObservationIndices)
-			rIndex = std::uint32_t(
-			    std::find(names.begin(), names.end(), i_Subject.m_Rotations.at(rIndex).m_Name) - names.begin());
-	for (std::size_t i = 0; i < names.size(); ++i)
-		i_Subject.m_Rotations[i].m_Name = names[i];
-	return i_Subject;
 }
 
 std::string ReadBytes(const boost::filesystem::path& i_rPath)
@@ -123,8 +103,8 @@ TEST_F(Flow, FromFBXToASavedSubjectAndBack)
 	VSubjectApplicationData data;
 	ASSERT_TRUE(other.GetTargetSubjectAndData(subject, data));
 	EXPECT_EQ(data.m_Skin, "character");
-	EXPECT_EQ(AsFilesKeepIt(subject), AsFilesKeepIt(Target()));
-	EXPECT_EQ(data, *m_Document.TargetValues().m_pApplicationData);
+	const VSubjectApplicationData& rSavedData = *m_Document.TargetValues().m_pApplicationData;
+	EXPECT_EQ(CoreOrlexQRTIO::FileDifference({Target(), rSavedData}, {subject, data}), "");
 
 	ASSERT_EQ(other.SaveTargetSubject(m_Folder / "again.qrr"), 0u);
 	EXPECT_EQ(ReadBytes(m_Folder / "again.qrr"), bytes);
@@ -132,7 +112,7 @@ TEST_F(Flow, FromFBXToASavedSubjectAndBack)
 	ASSERT_TRUE(other.LoadSourceSubject(c_Demo / "performer.qrs", ""));
 	other.UpdateTargets();
 	ASSERT_TRUE(other.GetTargetSubject(subject));
-	EXPECT_EQ(AsFilesKeepIt(subject), AsFilesKeepIt(Target()));
+	EXPECT_EQ(CoreOrlexQRTIO::FileDifference({Target(), data}, {subject, data}), "");
 }
 
 TEST_F(Flow, TheRootTakesItsPlaceInAWorldWithZUp)

@@ -1,5 +1,6 @@
 // The operations of VRetargetSetup that read and write files.
 
+#include "CoreOrlexQRTIO/FileDifference.h"
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexQRTIO/Writer.h"
 #include "DebugServices/GlobalLog.h"
@@ -22,6 +23,7 @@
 
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
+using CoreOrlexTypes::VSubjectRecord;
 using RetargetSetup::c_LogCategory;
 
 namespace
@@ -63,6 +65,35 @@ void TellNamesUsedTwice(const VSubjectParametrised& i_rSubject)
 			NVX_LOG(c_LogCategory, NVX::ELogWarning,
 			    "%1% segments are named '%2%': when the file is read, all their targets come back on the first", count,
 			    name);
+}
+
+/// Reads the file that is about to be written, in memory, and tells what would not come back.
+/// @return false if it could not be read at all, so that it must not replace a file that can.
+bool ReadsBack(const VSubjectRecord& i_rRecord, const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras)
+{
+	std::string text;
+	std::vector<std::string> errors;
+	std::vector<std::string> warnings;
+	if (!CoreOrlexQRTIO::VWriter().WriteText(i_rRecord.m_SubjectParametrised, i_rRecord.m_SubjectApplicationData,
+	        i_rExtras, CoreOrlexQRTIO::c_AutomaticVersion, text, errors, warnings))
+		return true; // What cannot be written is told by the writing itself.
+	VSubjectRecord read;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras;
+	if (!CoreOrlexQRTIO::VReader().ReadText(std::move(text), i_rRecord.m_SubjectParametrised.m_Name,
+	        i_rRecord.m_SubjectParametrised.m_SubjectId, read.m_SubjectParametrised, read.m_SubjectApplicationData,
+	        extras, errors, warnings))
+	{
+		NVX_LOG(c_LogCategory, NVX::ELogError, "Nothing was saved, since the file could not be read again: %1%",
+		    errors.empty() ? "" : errors.front());
+		return false;
+	}
+	const std::string difference = CoreOrlexQRTIO::FileDifference(i_rRecord, std::move(read));
+	if (difference.empty())
+		NVX_LOG(c_LogCategory, NVX::ELogInformation, "The file reads back equal to what is saved");
+	else
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "The file does not hold all of the subject: it reads back different, first in %1%", difference);
+	return true;
 }
 
 } // namespace
@@ -184,6 +215,8 @@ std::uint32_t VRetargetSetup::SaveTargetSubject(const boost::filesystem::path& i
 	if (!target.m_pParametrised || !target.m_pApplicationData)
 		return NVX::Status::c_NothingToActOn;
 	TellNamesUsedTwice(*target.m_pParametrised);
+	if (!ReadsBack({*target.m_pParametrised, *target.m_pApplicationData}, m_TargetExtras))
+		return NVX::Status::c_WriteFailure;
 	return CoreOrlexQRTIO::VWriter().Write(i_rPath, *target.m_pParametrised, *target.m_pApplicationData, m_TargetExtras,
 	    CoreOrlexQRTIO::c_AutomaticVersion);
 }
