@@ -13,6 +13,7 @@ VCommand AddDumpCommand(CLI::App& io_rProgram);
 VCommand AddConvertCommand(CLI::App& io_rProgram);
 VCommand AddFkCommand(CLI::App& io_rProgram);
 VCommand AddTargetsCommand(CLI::App& io_rProgram);
+VCommand AddCheckCommand(CLI::App& io_rProgram);
 VCommand AddCreateCommand(CLI::App& io_rProgram);
 VCommand AddEditCommand(CLI::App& io_rProgram);
 /// Hidden: prints the manual page or the shell completion of the option table.

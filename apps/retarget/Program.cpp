@@ -198,8 +198,9 @@ VProgram MakeProgram()
 	rApp.footer(c_pWalkThrough);
 	rApp.require_subcommand(0, 1);
 	rApp.allow_extras();
-	for (const auto pAdd : {AddCreateCommand, AddEditCommand, AddTargetsCommand, AddFbxCommand, AddDumpCommand,
-	         AddFkCommand, AddConvertCommand, AddSchemaCommand, AddEvalCommand, AddDocumentationCommand})
+	for (const auto pAdd :
+	    {AddCreateCommand, AddEditCommand, AddTargetsCommand, AddCheckCommand, AddFbxCommand, AddDumpCommand,
+	        AddFkCommand, AddConvertCommand, AddSchemaCommand, AddEvalCommand, AddDocumentationCommand})
 		program.m_Commands.push_back(pAdd(rApp));
 	AddMessageOptions(rApp, program.m_pMessages);
 	for (const VCommand& rCommand : program.m_Commands)

@@ -23,21 +23,26 @@ constexpr const char* c_LegacyExtension = ".qrx";
 
 } // namespace
 
-VSubjectFile ReadSubjectFile(const std::string& i_rPath)
+bool TryReadSubjectFile(const std::string& i_rPath, VSubjectFile& o_rFile)
 {
-	VSubjectFile file;
 	if (RetargetSetup::FileExtension(i_rPath) == c_LegacyExtension)
 	{
 		VSession session;
 		session.LoadTarget(i_rPath);
 		const auto values = session.Document().TargetValues();
-		file.m_Record = {*values.m_pParametrised, *values.m_pApplicationData};
-		file.m_Extras = session.Document().GetTargetExtras();
-		return file;
+		o_rFile.m_Record = {*values.m_pParametrised, *values.m_pApplicationData};
+		o_rFile.m_Extras = session.Document().GetTargetExtras();
+		return true;
 	}
 	CoreOrlexQRTIO::VReader reader;
-	if (!reader.Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId,
-	        file.m_Record.m_SubjectParametrised, file.m_Record.m_SubjectApplicationData, file.m_Extras))
+	return reader.Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId,
+	    o_rFile.m_Record.m_SubjectParametrised, o_rFile.m_Record.m_SubjectApplicationData, o_rFile.m_Extras);
+}
+
+VSubjectFile ReadSubjectFile(const std::string& i_rPath)
+{
+	VSubjectFile file;
+	if (!TryReadSubjectFile(i_rPath, file))
 		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a skeleton file");
 	return file;
 }

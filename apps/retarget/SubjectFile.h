@@ -16,6 +16,10 @@ struct VSubjectFile
 	CoreOrlexQRTIO::VSubjectQRTExtras m_Extras;
 };
 
+/// False if a skeleton file (.qrt, .qrk, .qrs, .qrr) could not be read, which is told; what could be read stands in the
+/// result all the same. Throws VCommandError with EBadInput for a legacy text file (.qrx) that fails.
+bool TryReadSubjectFile(const std::string& i_rPath, VSubjectFile& o_rFile);
+
 /// Reads a skeleton file as it stands, or a legacy text file (.qrx) as the document takes it in. Throws VCommandError
 /// with EBadInput if that fails.
 VSubjectFile ReadSubjectFile(const std::string& i_rPath);

@@ -219,10 +219,22 @@ template <typename TLinearFactory>
 bool VDynamicExpressionParserBase<TLinearFactory>::Initialise(
     const VSubjectParametrised& i_rSubject, std::vector<std::string>& io_rErrors)
 {
+	std::vector<VStaticParameterFailure> failures;
+	const bool bGood = Initialise(i_rSubject, failures);
+	for (VStaticParameterFailure& rFailure : failures)
+		io_rErrors.push_back(std::move(rFailure.m_Error));
+	return bGood;
+}
+
+template <typename TLinearFactory>
+bool VDynamicExpressionParserBase<TLinearFactory>::Initialise(
+    const VSubjectParametrised& i_rSubject, std::vector<VStaticParameterFailure>& io_rFailures)
+{
 	Reset();
 	bool bGood = true;
-	for (const VSubjectParametrised::VStaticParameter& rParameter : i_rSubject.m_StaticParameters)
+	for (std::size_t i = 0; i < i_rSubject.m_StaticParameters.size(); ++i)
 	{
+		const VSubjectParametrised::VStaticParameter& rParameter = i_rSubject.m_StaticParameters[i];
 		using CoreOrlexTypes::c_NotSet;
 		std::string error;
 		bool bAdded = false;
@@ -235,7 +247,9 @@ bool VDynamicExpressionParserBase<TLinearFactory>::Initialise(
 			    AddStaticParameter(rParameter.m_Name, rParameter.m_Prior != c_NotSet ? rParameter.m_Prior : 0.0, error);
 		if (bAdded)
 			continue;
-		io_rErrors.push_back(std::move(error));
+		double valueBefore = 0.0;
+		const bool bNameTaken = GetStaticParameter(rParameter.m_Name, valueBefore);
+		io_rFailures.push_back({i, std::move(error), bNameTaken});
 		bGood = false;
 	}
 	for (const VSubjectParametrised::VDynamicParameter& rParameter : i_rSubject.m_DynamicParameters)

@@ -95,6 +95,15 @@ private:
 	Math::VMathParser m_StaticParser;
 };
 
+/// A static parameter of a subject that could not be loaded.
+struct VStaticParameterFailure
+{
+	std::size_t m_Index = 0;
+	std::string m_Error;
+	/// One before it has its name.
+	bool m_bNameTaken = false;
+};
+
 /// Adds the dynamic parameters as variables, and with them the linear and the full context.
 template <typename TLinearFactory>
 class VDynamicExpressionParserBase : public VStaticExpressionParser
@@ -129,6 +138,10 @@ public:
 	/// and told.
 	/// @return true if no parameter failed.
 	bool Initialise(const CoreOrlexTypes::VSubjectParametrised& i_rSubject, std::vector<std::string>& io_rErrors);
+
+	/// The same, telling which parameters failed.
+	bool Initialise(
+	    const CoreOrlexTypes::VSubjectParametrised& i_rSubject, std::vector<VStaticParameterFailure>& io_rFailures);
 
 	/// An empty expression is 0, and so is the value of one that fails.
 	bool Evaluate(std::string_view i_Expression, double& o_rValue, std::string& o_rError,

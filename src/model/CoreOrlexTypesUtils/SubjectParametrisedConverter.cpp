@@ -42,6 +42,12 @@ TTo ConvertBehaviour(TFrom i_Behaviour)
 	return i_Behaviour >= 0 && i_Behaviour <= 3 ? TTo(i_Behaviour) : TTo(0);
 }
 
+void LogErrors(const std::vector<std::string>& i_rErrors)
+{
+	for (const std::string& rError : i_rErrors)
+		NVX_LOG("SubjectUtils", NVX::ELogError, "%1%", rError);
+}
+
 void ConvertSegmentBack(const VSubject::VSegment& i_rSegment, VSubjectParametrised::VSegment& o_rParametrised)
 {
 	o_rParametrised.m_Name = i_rSegment.m_Name;
@@ -106,7 +112,8 @@ bool SubjectParametrisedConverter::ConvertJoint(
 }
 
 bool SubjectParametrisedConverter::ConvertSegment(const VDynamicExpressionParserSimple& i_rParser,
-    const VSubjectParametrised::VSegment& i_rParametrised, VSubject::VSegment& o_rSegment, bool i_bUseTemplate)
+    const VSubjectParametrised::VSegment& i_rParametrised, VSubject::VSegment& o_rSegment, bool i_bUseTemplate,
+    std::vector<std::string>& io_rErrors)
 {
 	o_rSegment.m_Name = i_rParametrised.m_Name;
 	o_rSegment.m_SegmentIndex = i_rParametrised.m_SegmentIndex;
@@ -116,22 +123,22 @@ bool SubjectParametrisedConverter::ConvertSegment(const VDynamicExpressionParser
 	o_rSegment.m_InversePostTranslation = i_rParametrised.m_InversePostTranslation;
 
 	const bool bJoint = ConvertJoint(i_rParametrised.m_Joint, o_rSegment.m_Joint, i_bUseTemplate);
+	const auto fail = [&](const char* i_pWhat)
+	{ io_rErrors.push_back(std::string(i_pWhat) + " segment '" + i_rParametrised.m_Name + "'"); };
 	if (!bJoint)
-		NVX_LOG("SubjectUtils", NVX::ELogError, "Could not generate joint for segment '%1%'", i_rParametrised.m_Name);
+		fail("Could not generate joint for");
 	if (!EvaluateAll(i_rParser, i_rParametrised.m_PreTranslation, o_rSegment.m_PreTranslation))
-		NVX_LOG("SubjectUtils", NVX::ELogError, "Could not evaluate m_PreTranslation expressions in segment '%1%'",
-		    i_rParametrised.m_Name);
+		fail("Could not evaluate m_PreTranslation expressions in");
 	if (!EvaluateAll(i_rParser, i_rParametrised.m_PreRotation, o_rSegment.m_PreRotation))
-		NVX_LOG("SubjectUtils", NVX::ELogError, "Could not evaluate m_PreRotation expressions in segment '%1%'",
-		    i_rParametrised.m_Name);
+		fail("Could not evaluate m_PreRotation expressions in");
 	if (!EvaluateAll(i_rParser, i_rParametrised.m_Bounds, o_rSegment.m_Bounds))
-		NVX_LOG("SubjectUtils", NVX::ELogError, "Could not evaluate m_Bounds expressions in segment '%1%'",
-		    i_rParametrised.m_Name);
+		fail("Could not evaluate m_Bounds expressions in");
 	return bJoint;
 }
 
 bool SubjectParametrisedConverter::ConvertTarget(const VDynamicExpressionParserSimple& i_rParser,
-    const VSubjectParametrised::VTarget& i_rParametrised, VSubject::VTarget& o_rTarget, bool i_bUseTemplate)
+    const VSubjectParametrised::VTarget& i_rParametrised, VSubject::VTarget& o_rTarget, bool i_bUseTemplate,
+    std::vector<std::string>& io_rErrors)
 {
 	using VTarget = VSubject::VTarget;
 	o_rTarget.m_Type = VTarget::ETargetType(i_rParametrised.m_Type);
@@ -153,9 +160,27 @@ bool SubjectParametrisedConverter::ConvertTarget(const VDynamicExpressionParserS
 		std::string error;
 		if (i_rParser.Evaluate(i_rParametrised.m_StateExpressions[i], o_rTarget.m_State[i], error))
 			continue;
-		NVX_LOG("SubjectUtils", NVX::ELogError, "%1%", error);
+		io_rErrors.push_back(std::move(error));
 		bGood = false;
 	}
+	return bGood;
+}
+
+bool SubjectParametrisedConverter::ConvertSegment(const VDynamicExpressionParserSimple& i_rParser,
+    const VSubjectParametrised::VSegment& i_rParametrised, VSubject::VSegment& o_rSegment, bool i_bUseTemplate)
+{
+	std::vector<std::string> errors;
+	const bool bGood = ConvertSegment(i_rParser, i_rParametrised, o_rSegment, i_bUseTemplate, errors);
+	LogErrors(errors);
+	return bGood;
+}
+
+bool SubjectParametrisedConverter::ConvertTarget(const VDynamicExpressionParserSimple& i_rParser,
+    const VSubjectParametrised::VTarget& i_rParametrised, VSubject::VTarget& o_rTarget, bool i_bUseTemplate)
+{
+	std::vector<std::string> errors;
+	const bool bGood = ConvertTarget(i_rParser, i_rParametrised, o_rTarget, i_bUseTemplate, errors);
+	LogErrors(errors);
 	return bGood;
 }
 
@@ -190,8 +215,7 @@ bool SubjectParametrisedConverter::ConvertSubject(const VSubjectParametrised& i_
 	bool bGood = parser.Initialise(i_rParametrised, errors);
 	if (!bGood)
 		NVX_LOG("SubjectUtils", NVX::ELogError, "Error parsing subject static parameter expressions");
-	for (const std::string& rError : errors)
-		NVX_LOG("SubjectUtils", NVX::ELogError, "%1%", rError);
+	LogErrors(errors);
 
 	o_rSubject.m_SubjectId = i_rParametrised.m_SubjectId;
 	o_rSubject.m_Name = i_rParametrised.m_Name;

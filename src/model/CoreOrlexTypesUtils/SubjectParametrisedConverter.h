@@ -26,6 +26,13 @@ bool ConvertSegment(const VDynamicExpressionParserSimple& i_rParser,
 bool ConvertTarget(const VDynamicExpressionParserSimple& i_rParser,
     const CoreOrlexTypes::VSubjectParametrised::VTarget& i_rParametrised, CoreOrlexTypes::VSubject::VTarget& o_rTarget,
     bool i_bUseTemplate);
+/// The same without a log: what it would tell is appended.
+bool ConvertSegment(const VDynamicExpressionParserSimple& i_rParser,
+    const CoreOrlexTypes::VSubjectParametrised::VSegment& i_rParametrised,
+    CoreOrlexTypes::VSubject::VSegment& o_rSegment, bool i_bUseTemplate, std::vector<std::string>& io_rErrors);
+bool ConvertTarget(const VDynamicExpressionParserSimple& i_rParser,
+    const CoreOrlexTypes::VSubjectParametrised::VTarget& i_rParametrised, CoreOrlexTypes::VSubject::VTarget& o_rTarget,
+    bool i_bUseTemplate, std::vector<std::string>& io_rErrors);
 /// False if a statistic is neither empty nor of the size that the joint type prescribes; it is copied all the same.
 bool ConvertJoint(const CoreOrlexTypes::VSubjectParametrised::VJoint& i_rParametrised,
     CoreOrlexTypes::VSubject::VJoint& o_rJoint, bool i_bUseTemplate);

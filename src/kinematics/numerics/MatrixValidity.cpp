@@ -1,0 +1,59 @@
+#include "numerics/MatrixValidity.h"
+
+#include "numerics/fnl_symmetric_eigensystem.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace MatrixValidity
+{
+namespace
+{
+
+bool IsZero(std::span<const double> i_Matrix)
+{
+	return std::ranges::all_of(i_Matrix, [](double i_Value) { return i_Value == 0.0; });
+}
+
+/// What must hold before the eigenvalues are asked for.
+EFault FaultOfEntries(std::span<const double> i_Matrix, std::size_t i_Size)
+{
+	if (!std::ranges::all_of(i_Matrix, [](double i_Value) { return std::isfinite(i_Value); }))
+		return EFault::ENotFinite;
+	for (std::size_t row = 0; row < i_Size; ++row)
+		for (std::size_t column = 0; column < row; ++column)
+			if (!(std::abs(i_Matrix[row * i_Size + column] - i_Matrix[column * i_Size + row]) <= c_SymmetryTolerance))
+				return EFault::ENotSymmetric;
+	return EFault::ENone;
+}
+
+} // namespace
+
+// The comparisons with 0 are written so that NaN fails.
+
+template <std::size_t t_Size>
+EFault FaultAsSemidefinite(std::span<const double, t_Size * t_Size> i_Matrix)
+{
+	const EFault fault = FaultOfEntries(i_Matrix, t_Size);
+	if (fault != EFault::ENone || IsZero(i_Matrix))
+		return fault;
+	std::array<double, t_Size * t_Size> matrix;
+	std::ranges::copy(i_Matrix, matrix.begin());
+	return fnl_symmetric_eigensystem<t_Size>(matrix).Values().front() >= 0.0 ? EFault::ENone : EFault::EEigenvalue;
+}
+
+template EFault FaultAsSemidefinite<3>(std::span<const double, 9> i_Matrix);
+template EFault FaultAsSemidefinite<6>(std::span<const double, 36> i_Matrix);
+
+EFault FaultAsDefinite(std::span<const double> i_Matrix, std::size_t i_Size)
+{
+	const EFault fault = FaultOfEntries(i_Matrix, i_Size);
+	if (fault != EFault::ENone || IsZero(i_Matrix))
+		return fault;
+	std::vector<double> vectors;
+	std::vector<double> values;
+	fnl_symmetric_eigensystem_compute({i_Matrix.begin(), i_Matrix.end()}, vectors, values);
+	return values.front() > 0.0 ? EFault::ENone : EFault::EEigenvalue;
+}
+
+} // namespace MatrixValidity
