@@ -69,7 +69,12 @@ EExitStatus ShowFindings(const VCheckSettings& i_rSettings)
 {
 	VSubjectFile file;
 	const bool bRead = TryReadSubjectFile(i_rSettings.m_File, file);
-	const VFindings findings = FindingsOf(file.m_Record);
+	VFindings findings = FindingsOf(file.m_Record);
+	// Elements that the reader dropped leave gaps among the others that are no fault of the file's.
+	if (!bRead)
+		std::erase_if(findings,
+		    [](const VSubjectFinding& i_rFinding)
+		    { return i_rFinding.m_Element != VSubjectFinding::EStaticParameter; });
 	if (bRead || !findings.empty())
 	{
 		if (i_rSettings.m_bJson)
@@ -80,7 +85,7 @@ EExitStatus ShowFindings(const VCheckSettings& i_rSettings)
 	if (!bRead)
 		throw VCommandError(EBadInput,
 		    "\"" + i_rSettings.m_File + "\" could not be read as a skeleton file"
-		        + (findings.empty() ? "" : "; the findings are of what could be read"));
+		        + (findings.empty() ? "" : "; only its static parameters were checked"));
 	return findings.empty() ? EFine : EFindings;
 }
 

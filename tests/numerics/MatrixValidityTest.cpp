@@ -62,6 +62,16 @@ TEST(MatrixValidity, OfOtherSizes)
 	six[5] = six[30] = 2.0;
 	EXPECT_EQ(FaultAsSemidefinite<6>(six), EFault::EEigenvalue);
 	EXPECT_EQ(FaultAsDefinite(six, 6), EFault::EEigenvalue);
+	std::array<double, 4> two{1, 2, 2, 5};
+	EXPECT_EQ(FaultAsDefinite(two, 2), EFault::ENone);
+	two[3] = 3;
+	EXPECT_EQ(FaultAsDefinite(two, 2), EFault::EEigenvalue);
+	std::array<double, 16> four{};
+	for (std::size_t i = 0; i < 4; ++i)
+		four[5 * i] = 1.0;
+	EXPECT_EQ(FaultAsDefinite(four, 4), EFault::ENone);
+	four[15] = -1.0;
+	EXPECT_EQ(FaultAsDefinite(four, 4), EFault::EEigenvalue);
 }
 
 } // namespace

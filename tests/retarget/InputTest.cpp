@@ -62,6 +62,7 @@ TEST_F(Input, OfSkeletonFiles)
 	{
 		const std::string file = rCase.m_pFile;
 		rows.push_back({rCase.m_pFile, {"dump", file}, 3, "", rCase.m_pMessage});
+		rows.push_back({rCase.m_pFile, {"check", file}, 3, "", rCase.m_pMessage});
 		rows.push_back({rCase.m_pFile, {"fk", file}, 3, "", rCase.m_pMessage});
 		rows.push_back({rCase.m_pFile, {"targets", file}, 3, "", rCase.m_pMessage});
 		rows.push_back({rCase.m_pFile, {"convert", file, "x.qrs"}, 3, "", rCase.m_pMessage});

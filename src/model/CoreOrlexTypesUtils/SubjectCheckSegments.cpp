@@ -29,7 +29,7 @@ bool CheckChild(const VSubject& i_rSubject, std::size_t i_SegmentIndex, const VR
 	const std::size_t parentIndex = rChild.m_ParentSegmentIndex;
 	if (rChild.m_ParentSegmentIndex == c_NoParent)
 		return i_rReport.Fail("The parent segment of a child segment must be set.",
-		    "Set ParentSegmentIndex to a segment that stands before this one: only the first may have no parent.");
+		    "Put it below a segment that stands before it: only the first may have no parent.");
 	if (parentIndex >= i_rSubject.m_Segments.size())
 		return i_rReport.Fail("Out-of-range parent segment index.",
 		    "Set ParentSegmentIndex to a segment that stands before this one; there is no segment #"
