@@ -4,8 +4,13 @@
 
 #include <algorithm>
 
-std::vector<double> CoreOrlexTypesUtils::PoseVector(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
-    std::vector<double> CoreOrlexTypes::VSubjectParametrised::VJoint::*i_pStatistic)
+namespace CoreOrlexTypesUtils
+{
+
+using CoreOrlexTypes::VSubjectParametrised;
+
+std::vector<double> PoseVector(
+    const VSubjectParametrised& i_rSubject, std::vector<double> VSubjectParametrised::VJoint::*i_pStatistic)
 {
 	std::vector<double> pose;
 	pose.reserve(6 + 3 * i_rSubject.m_Segments.size());
@@ -19,3 +24,27 @@ std::vector<double> CoreOrlexTypesUtils::PoseVector(const CoreOrlexTypes::VSubje
 	}
 	return pose;
 }
+
+std::vector<double> VSubjectParametrised::VJoint::*PoseMean(ESubjectParametrisedPoseType i_PoseType)
+{
+	using VJoint = VSubjectParametrised::VJoint;
+	switch (i_PoseType)
+	{
+	case ESubjectParametrisedPoseType::ETPose: return &VJoint::m_TPoseMean;
+	case ESubjectParametrisedPoseType::ETemplate: return &VJoint::m_TemplateMean;
+	default: return &VJoint::m_Mean;
+	}
+}
+
+std::vector<double> VSubjectParametrised::VJoint::*PoseCovariance(ESubjectParametrisedPoseType i_PoseType)
+{
+	using VJoint = VSubjectParametrised::VJoint;
+	switch (i_PoseType)
+	{
+	case ESubjectParametrisedPoseType::ETPose: return &VJoint::m_TPoseCovariance;
+	case ESubjectParametrisedPoseType::ETemplate: return &VJoint::m_TemplateCovariance;
+	default: return &VJoint::m_Covariance;
+	}
+}
+
+} // namespace CoreOrlexTypesUtils

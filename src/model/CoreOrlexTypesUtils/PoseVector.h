@@ -12,4 +12,16 @@ namespace CoreOrlexTypesUtils
 std::vector<double> PoseVector(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
     std::vector<double> CoreOrlexTypes::VSubjectParametrised::VJoint::*i_pStatistic);
 
+/// Which of a joint's statistics make up a pose.
+enum class ESubjectParametrisedPoseType
+{
+	EMean,
+	ETPose,
+	ETemplate
+};
+
+std::vector<double> CoreOrlexTypes::VSubjectParametrised::VJoint::*PoseMean(ESubjectParametrisedPoseType i_PoseType);
+std::vector<double> CoreOrlexTypes::VSubjectParametrised::VJoint::*PoseCovariance(
+    ESubjectParametrisedPoseType i_PoseType);
+
 } // namespace CoreOrlexTypesUtils
