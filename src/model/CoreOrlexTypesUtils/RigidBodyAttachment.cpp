@@ -7,9 +7,9 @@
 #include "CoreOrlexTypesUtils/RigidBody.h"
 #include "CoreOrlexTypesUtils/RigidBodyFrames.h"
 #include "CoreOrlexTypesUtils/RigidBodyLayout.h"
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
 #include "CoreOrlexTypesUtils/SubjectKind.h"
 #include "CoreOrlexTypesUtils/TargetFrames.h"
+#include "CoreOrlexTypesUtils/UnusedParameters.h"
 
 #include "DebugServices/GlobalLog.h"
 
@@ -160,35 +160,6 @@ void MoveTarget(const VPose& i_rFrame, const std::vector<double>& i_rState, type
 	TurnNormals(i_rFrame.R, io_rTarget.m_ViewNormals);
 }
 
-void RemoveParametersOf(const VSubject::VTarget&, VSubject&) {}
-
-/// Removes the static parameters that a target used, and that no other expression does.
-void RemoveParametersOf(const VSubjectParametrised::VTarget& i_rTarget, VSubjectParametrised& io_rSubject)
-{
-	VDynamicExpressionParserSimple parser;
-	std::vector<std::string> errors;
-	parser.Initialise(io_rSubject, errors);
-	std::string error;
-	std::set<std::string> own;
-	for (const std::string& rText : i_rTarget.m_StateExpressions)
-		parser.EvaluateChecked(rText, own, error);
-	std::set<std::string> others;
-	parser.GetUsedParameters(io_rSubject, others);
-	for (const auto& rSegment : io_rSubject.m_Segments)
-	{
-		parser.EvaluateFull(rSegment.m_MassExpression, others);
-		for (const auto* pTexts : {&rSegment.m_MassCentreExpressions, &rSegment.m_RadiusOfGyrationExpressions})
-			for (const std::string& rText : *pTexts)
-				parser.EvaluateFull(rText, others);
-		for (const std::string& rText : rSegment.m_Bounds)
-			parser.EvaluateFull(rText, others);
-	}
-	for (const auto& rParameter : io_rSubject.m_StaticParameters)
-		parser.EvaluateFull(rParameter.m_DefaultExpression, others);
-	std::erase_if(io_rSubject.m_StaticParameters,
-	    [&](const auto& i_rParameter) { return own.count(i_rParameter.m_Name) && !others.count(i_rParameter.m_Name); });
-}
-
 template <typename TSubject>
 bool OwnsSegment(const TSubject& i_rSubject, std::size_t i_TargetIndex)
 {
@@ -279,9 +250,11 @@ bool AttachRigidBody(TSubject& io_rSubject, VSubjectApplicationData& io_rSubject
 	const std::size_t segmentIndex = std::size_t(segment - io_rSubject.m_Segments.begin());
 	const std::uint32_t firstMarker = std::uint32_t(io_rSubject.m_Markers.size());
 	auto& rRigidBodyTgt = RigidBody.m_Targets.front();
+	const typename TSubject::VTarget asWritten = rRigidBodyTgt;
 	const VPose& rBodyFrame = bodyFrames[rRigidBodyTgt.m_SegmentIndices.front()];
 	MoveTarget<TSubject>(Rotation::Relative(subjectFrames[segmentIndex], rBodyFrame),
 	    evaluated.m_Targets.front().m_State, rRigidBodyTgt);
+	DropParametersOf(asWritten, RigidBody);
 	rRigidBodyTgt.m_SegmentIndices = {std::uint32_t(segmentIndex)};
 	for (std::uint32_t& rIndex : rRigidBodyTgt.m_MarkerIndices)
 		rIndex += firstMarker;
@@ -340,7 +313,7 @@ bool RemoveRigidBody(TSubject& io_rSubject, VSubjectApplicationData& io_rSubject
 	if (i_TargetIndex < io_rSubjectAppData.m_Targets.size())
 		io_rSubjectAppData.m_Targets.erase(io_rSubjectAppData.m_Targets.begin() + std::ptrdiff_t(i_TargetIndex));
 	DropMarkers(io_rSubject, io_rSubjectAppData, VRenumbering(keep));
-	RemoveParametersOf(target, io_rSubject);
+	DropParametersOf(target, io_rSubject);
 	if (bOwnSegment)
 		RemoveSegment(io_rSubject, io_rSubjectAppData, target.m_SegmentIndices.front());
 	return true;

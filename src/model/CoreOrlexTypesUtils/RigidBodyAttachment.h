@@ -13,6 +13,7 @@ namespace CoreOrlexTypesUtils::RigidBodyUtils
 /// Merges a body, of either layout, into a subject: its parameters, its markers, whose ids become the hashes of their
 /// names, its sticks, and one ERigidBody target on the segment of that name. With the joints of both in their Mean the
 /// markers stay where they are in the world; the target's pose becomes numbers, its marker positions stay as written.
+/// Static parameters that only the pose used are left behind.
 template <typename TSubject>
 bool AttachRigidBody(TSubject& io_rSubject, CoreOrlexTypes::VSubjectApplicationData& io_rSubjectAppData,
     const TSubject& i_rRigidBody, const CoreOrlexTypes::VSubjectApplicationData& i_rRigidBodyAppData,

@@ -5,6 +5,7 @@
 #include "CoreOrlexTypesUtils/RigidBodyFrames.h"
 #include "CoreOrlexTypesUtils/SubjectKind.h"
 #include "CoreOrlexTypesUtils/TargetFrames.h"
+#include "CoreOrlexTypesUtils/UnusedParameters.h"
 
 #include "DebugServices/GlobalLog.h"
 
@@ -272,6 +273,7 @@ bool ToPointTargets(TSubject& io_rSubject, VSubjectApplicationData& io_rAppData)
 		if (body.m_MarkerIndices[i] < io_rSubject.m_Markers.size())
 			io_rAppData.m_Targets[i].m_Name = io_rSubject.m_Markers[body.m_MarkerIndices[i]].m_Name;
 	}
+	DropParametersOf(body, io_rSubject);
 	return true;
 }
 

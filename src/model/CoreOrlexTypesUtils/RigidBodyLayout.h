@@ -19,7 +19,7 @@ template <typename TSubject>
 bool ToRigidBodyTarget(TSubject& io_rSubject);
 
 /// Makes a Gaussian point target on the root of each marker of the ERigidBody target, named after the marker. Where the
-/// body's pose is not the identity positions become numbers.
+/// body's pose is not the identity positions become numbers; static parameters that only the body used go.
 template <typename TSubject>
 bool ToPointTargets(TSubject& io_rSubject, CoreOrlexTypes::VSubjectApplicationData& io_rAppData);
 template <typename TSubject>

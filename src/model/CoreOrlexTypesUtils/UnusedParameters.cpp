@@ -1,0 +1,36 @@
+#include "CoreOrlexTypesUtils/UnusedParameters.h"
+
+#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+
+namespace CoreOrlexTypesUtils
+{
+
+using CoreOrlexTypes::VSubjectParametrised;
+
+void DropParametersOf(const VSubjectParametrised::VTarget& i_rTarget, VSubjectParametrised& io_rSubject)
+{
+	VDynamicExpressionParserSimple parser;
+	std::vector<std::string> errors;
+	parser.Initialise(io_rSubject, errors);
+	std::string error;
+	std::set<std::string> own;
+	for (const std::string& rText : i_rTarget.m_StateExpressions)
+		parser.EvaluateChecked(rText, own, error);
+	std::set<std::string> others;
+	parser.GetUsedParameters(io_rSubject, others);
+	for (const auto& rSegment : io_rSubject.m_Segments)
+	{
+		parser.EvaluateFull(rSegment.m_MassExpression, others);
+		for (const auto* pTexts : {&rSegment.m_MassCentreExpressions, &rSegment.m_RadiusOfGyrationExpressions})
+			for (const std::string& rText : *pTexts)
+				parser.EvaluateFull(rText, others);
+		for (const std::string& rText : rSegment.m_Bounds)
+			parser.EvaluateFull(rText, others);
+	}
+	for (const auto& rParameter : io_rSubject.m_StaticParameters)
+		parser.EvaluateFull(rParameter.m_DefaultExpression, others);
+	std::erase_if(io_rSubject.m_StaticParameters,
+	    [&](const auto& i_rParameter) { return own.count(i_rParameter.m_Name) && !others.count(i_rParameter.m_Name); });
+}
+
+} // namespace CoreOrlexTypesUtils

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "CoreOrlexTypes/Subject.h"
+
+namespace CoreOrlexTypesUtils
+{
+
+/// Drops the static parameters that a target, which has left the subject or has been written anew, used in its state
+/// and that no expression of the subject uses.
+void DropParametersOf(
+    const CoreOrlexTypes::VSubjectParametrised::VTarget& i_rTarget, CoreOrlexTypes::VSubjectParametrised& io_rSubject);
+
+/// Has no parameters.
+inline void DropParametersOf(const CoreOrlexTypes::VSubject::VTarget&, CoreOrlexTypes::VSubject&) {}
+
+} // namespace CoreOrlexTypesUtils
