@@ -9,9 +9,9 @@
 /// rotations in radians and from 0.01 to 1e6 for translations in mm; what lies beyond counts as the end.
 ///
 /// Of ball and free joints the rest pose is Euler angles of order XYZ, then the translation; the covariance of their
-/// rotation is about the axes of the joint at rest. There and back gives the same angles and stiffness, but for a gimbal
-/// lock, where the outer angles turn about one axis: there the first angle comes back as 0, the third as the sum, and
-/// the two share what is known of their stiffness.
+/// rotation is about the axes of the joint at rest. There and back gives the same angles and stiffness, but for a
+/// gimbal lock, where the outer angles turn about one axis: there the first angle comes back as 0, the third as the
+/// sum, and the two share what is known of their stiffness.
 namespace CoreOrlexTypesUtils::TemplateSubjectUtils
 {
 
