@@ -1,7 +1,15 @@
 #include "CheckedSubject.h"
 
+#include "CoreOrlexTypesUtils/JointRange.h"
+#include "CoreOrlexTypesUtils/PruneToActive.h"
+#include "CoreOrlexTypesUtils/RestPose.h"
+#include "CoreOrlexTypesUtils/RigidBodyAttachment.h"
+#include "CoreOrlexTypesUtils/RigidBodyGuids.h"
+#include "CoreOrlexTypesUtils/RigidBodyLayout.h"
+#include "CoreOrlexTypesUtils/Scaling.h"
 #include "CoreOrlexTypesUtils/SubjectCheck.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/TargetPerMarker.h"
 
 #include <algorithm>
 #include <random>
@@ -11,6 +19,9 @@ namespace
 
 using namespace CoreOrlexTypesUtils;
 using namespace CoreOrlexTypesUtils::SubjectParametrisedConverter;
+using namespace CoreOrlexTypesUtils::SubjectParametrisedUtils;
+using namespace CoreOrlexTypesUtils::RigidBodyUtils;
+using CoreOrlexTypes::VSubjectApplicationData;
 
 /// Sanitizers look at each; without them a part is enough.
 #if defined(__has_feature)
@@ -202,6 +213,98 @@ TEST(BrokenSubjects, AreCheckedWithoutACrash)
 	// The generator reaches what lies behind the first checks.
 	EXPECT_GT(good, c_SubjectCount / 100u);
 	EXPECT_LT(good, c_SubjectCount / 2u);
+}
+
+/// As it is, but for what every rigid body needs.
+VSubjectParametrised AsBody(VSubjectParametrised i_Subject)
+{
+	using VJoint = VSubjectParametrised::VJoint;
+	using VTarget = VSubjectParametrised::VTarget;
+	i_Subject.m_Name = "Body";
+	i_Subject.m_Segments.resize(std::max<std::size_t>(i_Subject.m_Segments.size(), 1));
+	for (auto& rSegment : i_Subject.m_Segments)
+		rSegment.m_Joint = {};
+	i_Subject.m_Segments[0].m_Joint.m_JointType = VJoint::EFree;
+	i_Subject.m_Markers.resize(std::max<std::size_t>(i_Subject.m_Markers.size(), 3));
+	for (auto& rTarget : i_Subject.m_Targets)
+		rTarget.m_SegmentIndices = {0};
+	if (i_Subject.m_Targets.size() == 1)
+		i_Subject.m_Targets[0].m_Type = VTarget::ERigidBody;
+	return i_Subject;
+}
+
+template <typename TSubject>
+void ExpectInStep(const TSubject& i_rSubject, const VSubjectApplicationData& i_rAppData)
+{
+	ASSERT_EQ(i_rSubject.m_Segments.size(), i_rAppData.m_Segments.size());
+	ASSERT_EQ(i_rSubject.m_Markers.size(), i_rAppData.m_Markers.size());
+	ASSERT_EQ(i_rSubject.m_Targets.size(), i_rAppData.m_Targets.size());
+}
+
+template <typename TSubject>
+VSubjectApplicationData DataOf(const TSubject& i_rSubject)
+{
+	VSubjectApplicationData appData;
+	appData.m_Segments.resize(i_rSubject.m_Segments.size());
+	appData.m_Markers.resize(i_rSubject.m_Markers.size());
+	appData.m_Targets.resize(i_rSubject.m_Targets.size());
+	appData.m_Sticks = {{0, {}, 1, {}}, {77, {}, 2, {}}};
+	return appData;
+}
+
+template <typename TSubject>
+std::size_t UseTools(TSubject i_Subject, TSubject i_Body, std::uint32_t i_Round)
+{
+	VSubjectApplicationData appData = DataOf(i_Subject);
+	VSubjectApplicationData bodyData = DataOf(i_Body);
+	std::size_t done = ToPointTargets(i_Body, bodyData);
+	ExpectInStep(i_Body, bodyData);
+	done += ToRigidBodyTarget(i_Body, bodyData);
+	ExpectInStep(i_Body, bodyData);
+	const TSubject before = i_Subject;
+	if (AttachRigidBody(i_Subject, appData, i_Body, bodyData, "s"))
+		done += RemoveRigidBody(i_Subject, appData, i_Subject.m_Targets.size() - 1);
+	else
+		EXPECT_TRUE(i_Subject == before);
+	ExpectInStep(i_Subject, appData);
+	MakeOneTargetPerMarker(i_Subject, appData);
+	ExpectInStep(i_Subject, appData);
+	CheckCalibration(i_Subject);
+	done += PruneToActive(i_Subject, appData, {i_Round % 5, 2, 1}, {0});
+	ExpectInStep(i_Subject, appData);
+	if constexpr (std::is_same_v<TSubject, VSubject>)
+		done += TemplateSubjectUtils::ScaleSubject(i_Subject, 2);
+	else
+		done += SubjectParametrisedUtils::ScaleSubject(i_Subject, 2);
+	return done;
+}
+
+TEST(BrokenSubjects, AreWorkedOnWithoutACrash)
+{
+	const auto pSink = NVX::GlobalLog::AddSink([](const NVX::VLogCategory&, int, const std::string&) {});
+	VSubjectGenerator generator;
+	std::size_t done = 0;
+	for (int i = 0; i < c_SubjectCount / 5; ++i)
+	{
+		const VSubjectParametrised subject = generator.Make();
+		VSubjectParametrised body = AsBody(generator.Make());
+		AddGuids(body);
+		done += UseTools(subject, body, std::uint32_t(i)) + UseTools(Numbers(subject), Numbers(body), std::uint32_t(i));
+		for (const auto& rSegment : subject.m_Segments)
+		{
+			const auto& rJoint = rSegment.m_Joint;
+			VNumbers first;
+			VNumbers second;
+			TemplateSubjectUtils::MeanCovarianceToRestPoseStiffness(
+			    rJoint.m_JointType, rJoint.m_Mean, rJoint.m_Covariance, first, second);
+			TemplateSubjectUtils::RestPoseStiffnessToMeanCovariance(
+			    rJoint.m_JointType, rJoint.m_Mean, rJoint.m_RangeCentringState, first, second);
+			TemplateSubjectUtils::RangeToMinMax(
+			    rJoint.m_JointType, rJoint.m_RangeCentringState, rJoint.m_RangeMatrix, first, second);
+		}
+	}
+	// All tools of both subject types do their work on some.
+	EXPECT_GT(done, c_SubjectCount / 5u);
 }
 
 } // namespace

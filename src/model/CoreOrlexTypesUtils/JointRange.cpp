@@ -172,7 +172,7 @@ bool RangeToMinMax(VJoint::EJointType i_JointType, const VNumbers& i_rRangeCente
 			o_rMax[i] = i_rRangeCenteringState[i] + extents[i];
 		}
 	}
-	return true;
+	return AreFinite(o_rMin, o_rMax);
 }
 
 bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const VNumbers& i_rMax,
@@ -206,7 +206,7 @@ bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const
 		o_rRangeCenteringState[i] = i_rMin[i] + d * 0.5;
 		o_rRangeMatrix[i * (DoFCount + 1)] = d * d * 0.25;
 	}
-	return true;
+	return AreFinite(o_rRangeCenteringState, o_rRangeMatrix);
 }
 
 } // namespace CoreOrlexTypesUtils::TemplateSubjectUtils

@@ -101,6 +101,8 @@ bool ToRestPose(const VNumbers& i_rMean, const VNumbers& i_rCovariance, VNumbers
 	    Rotation::RotationMatrixFromAngleAxis({i_rMean[0], i_rMean[1], i_rMean[2]}), c_EditedEulerOrder, angles);
 	o_rRestPose = i_rMean;
 	std::copy(angles.begin(), angles.end(), o_rRestPose.begin());
+	if (!AllFinite(o_rRestPose))
+		return TellNotFinite();
 
 	const VMatrix3 inverse = fnl_svd_fixed<3, 3>(TurnsOfAngles(angles)).Inverse(c_GimbalLock);
 	const VMatrix3 ofAngles = Rotation::Product(
@@ -153,6 +155,8 @@ bool FromRestPose(const VNumbers& i_rRestPose, const VNumbers& i_rStiffness, VNu
 	o_rMean = i_rRestPose;
 	std::copy(mean.begin(), mean.end(), o_rMean.begin());
 	o_rCovariance.assign(AACovariance.begin(), AACovariance.end());
+	if (!AllFinite(o_rCovariance))
+		return TellNotFinite();
 	KeepPositive<t_Size>(o_rCovariance);
 	return true;
 }

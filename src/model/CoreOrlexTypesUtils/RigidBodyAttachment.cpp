@@ -53,7 +53,14 @@ bool PrepareBody(TSubject& io_rRigidBody, VSubjectApplicationData& io_rAppData, 
 	std::vector<VVector3> positions;
 	VPoseCovariance poseCovariance;
 	std::vector<VMatrix3> covariance;
+	// An index beyond the list could come to mean a marker of the other subject.
+	const auto inRange = [&](const auto& i_rTarget)
+	{
+		return std::all_of(i_rTarget.m_MarkerIndices.begin(), i_rTarget.m_MarkerIndices.end(),
+		    [&](std::uint32_t i_Index) { return i_Index < io_rRigidBody.m_Markers.size(); });
+	};
 	const bool bGood = ValidateRigidBody(io_rRigidBody)
+	    && std::all_of(io_rRigidBody.m_Targets.begin(), io_rRigidBody.m_Targets.end(), inRange)
 	    && (io_rRigidBody.m_Targets.size() == 1 || ToRigidBodyTarget(io_rRigidBody, io_rAppData))
 	    && EvaluateSubject(io_rRigidBody, o_rEvaluated)
 	    && ReadRigidBody(o_rEvaluated.m_Targets.front(), pose, positions, poseCovariance, covariance);
