@@ -44,9 +44,9 @@ std::function<void(INode&)> Note(VTexts& io_rVisited)
 {
 	return [&](INode& io_rNode)
 	{
-		std::string text;
+		std::string_view text;
 		io_rNode.ProcessAttribute("n", text, "", "xsd:string", false);
-		io_rVisited.push_back(io_rNode.GetName() + text);
+		io_rVisited.push_back(io_rNode.GetName() + std::string(text));
 	};
 }
 
@@ -86,10 +86,10 @@ VFormat Attribute(const VGate& i_rGate)
 	return [=](INode& io_rNode, VTexts& io_rVisited)
 	{
 		io_rNode.SetVersion(i_rGate.m_Version);
-		std::string text;
+		std::string_view text;
 		if (io_rNode.ProcessAttribute(
 		        "n", text, "", i_rGate.m_Type, i_rGate.m_bRequired, i_rGate.m_Minimum, i_rGate.m_Maximum))
-			io_rVisited.push_back(text);
+			io_rVisited.emplace_back(text);
 	};
 }
 
@@ -178,7 +178,7 @@ TEST(ReaderNode, KnowsIdentifiersReadSoFar)
 		    io_rNode.ProcessElements(
 		        [](INode& io_rChild)
 		        {
-			        std::string text;
+			        std::string_view text;
 			        io_rChild.ProcessAttribute(
 			            "n", text, "", io_rChild.GetName() == "a" ? "xsd:ID" : "xsd:IDREF", true);
 		        });

@@ -17,7 +17,7 @@ const IEnum& Styles()
 /// A small format with all that a schema can tell: a choice, counts, versions, a type, recursion.
 void Node(INode& io_rNode)
 {
-	std::string text;
+	std::string_view text;
 	EXPECT_FALSE(io_rNode.ProcessAttribute("NAME", text, "The \"name\"", "xsd:ID", true));
 	io_rNode.DeclareElement("Ball", "Ball joint", 1, 1);
 	io_rNode.DeclareElement("Hinge", "Hinge joint", 1, 1, {2, 0});

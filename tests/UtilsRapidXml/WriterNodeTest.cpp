@@ -90,7 +90,7 @@ TEST(WriterNode, GivesBackEveryText)
 		std::string error;
 		ASSERT_TRUE(again.Parse(document.Print(), error)) << error;
 		VReaderNode reader(again, true);
-		std::string read = "nothing";
+		std::string_view read = "nothing";
 		reader.DeclareElement("a", "", 1, 1);
 		reader.ProcessElements(
 		    [&](INode& io_rNode) { EXPECT_TRUE(io_rNode.ProcessAttribute("n", read, "", "xsd:string", true)); });

@@ -18,54 +18,49 @@ namespace
 {
 
 /// What stands between the values of a list, in the C form.
-constexpr std::string_view c_White = " \t\n\v\f\r";
+bool IsWhite(char i_Byte)
+{
+	return i_Byte == ' ' || (i_Byte >= '\t' && i_Byte <= '\r');
+}
 
 std::string_view AfterWhite(std::string_view i_Text)
 {
-	return i_Text.substr(std::min(i_Text.find_first_not_of(c_White), i_Text.size()));
-}
-
-/// Where the text of a list stands while it is cut, so that a file of many lists does not allocate for each.
-std::string& ListText()
-{
-	static thread_local std::string s_Text;
-	return s_Text;
+	return {std::ranges::find_if_not(i_Text, IsWhite), i_Text.end()};
 }
 
 } // namespace
 
 bool ReadExpressions(INode& io_rNode, const VAttribute& i_rAttribute, std::span<std::string> o_Expressions)
 {
-	std::string& rText = ListText();
-	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
+	std::string_view text;
+	if (!ReadAttribute(io_rNode, i_rAttribute, text))
 		return false;
+	text = Trimmed(text);
 	std::size_t count = 0;
-	for (std::string_view rest = Trimmed(rText); !rest.empty(); ++count)
+	for (std::string_view rest = text; !rest.empty(); ++count)
 		TakeExpression(rest);
 	if (count != o_Expressions.size())
 	{
 		UtilsRapidXml::AddIncorrectCount(io_rNode, i_rAttribute.m_Name);
 		return false;
 	}
-	std::string_view rest = Trimmed(rText);
 	for (std::string& rExpression : o_Expressions)
-		rExpression = TakeExpression(rest);
+		rExpression = TakeExpression(text);
 	return true;
 }
 
 bool ReadReals(INode& io_rNode, const VAttribute& i_rAttribute, std::vector<double>& o_rValues)
 {
-	std::string& rText = ListText();
-	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
+	std::string_view rest;
+	if (!ReadAttribute(io_rNode, i_rAttribute, rest))
 		return false;
 	std::vector<double> values;
-	for (std::string_view rest = rText; !AfterWhite(rest).empty();)
+	while (!(rest = AfterWhite(rest)).empty())
 	{
 		double value = 0.0;
 		const std::size_t read = NumberText::ScanReal(rest, value);
 		rest.remove_prefix(read);
-		if (read == 0 || (!rest.empty() && c_White.find(rest.front()) == std::string_view::npos)
-		    || !std::isfinite(value))
+		if (read == 0 || (!rest.empty() && !IsWhite(rest.front())) || !std::isfinite(value))
 		{
 			UtilsRapidXml::AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
 			return false;
@@ -78,15 +73,15 @@ bool ReadReals(INode& io_rNode, const VAttribute& i_rAttribute, std::vector<doub
 
 bool ReadColour(INode& io_rNode, const VAttribute& i_rAttribute, CoreOrlexTypes::VColour& o_rColour)
 {
-	std::string& rText = ListText();
-	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
+	std::string_view rest;
+	if (!ReadAttribute(io_rNode, i_rAttribute, rest))
 		return false;
 	std::uint8_t values[3];
 	std::size_t count = 0;
 	bool bConverted = true;
-	for (std::string_view rest = rText; (rest = AfterWhite(rest)).size() > 0; ++count)
+	for (; !(rest = AfterWhite(rest)).empty(); ++count)
 	{
-		const std::size_t end = std::min(rest.find_first_of(c_White), rest.size());
+		const std::size_t end = std::ranges::find_if(rest, IsWhite) - rest.begin();
 		std::uint32_t value = 0;
 		bConverted = bConverted && UtilsRapidXml::ToValue(rest.substr(0, end), value);
 		if (count < 3)

@@ -7,10 +7,10 @@ namespace CoreOrlexQRTIO
 
 std::string_view Trimmed(std::string_view i_Text)
 {
-	const std::size_t first = i_Text.find_first_not_of(" \t");
-	if (first == std::string_view::npos)
-		return {};
-	return i_Text.substr(first, i_Text.find_last_not_of(" \t") + 1 - first);
+	const auto isBlank = [](char i_Byte) { return i_Byte == ' ' || i_Byte == '\t'; };
+	const auto first = std::ranges::find_if_not(i_Text, isBlank);
+	const auto last = std::find_if_not(i_Text.rbegin(), std::make_reverse_iterator(first), isBlank).base();
+	return {first, last};
 }
 
 std::string_view TakeExpression(std::string_view& io_rText)

@@ -8,7 +8,7 @@
 
 #include <algorithm>
 #include <cmath>
-#include <unordered_set>
+#include <set>
 
 namespace CoreOrlexQRTIO
 {
@@ -56,15 +56,20 @@ public:
 
 	bool IsFine(std::string_view i_Expression, std::string& o_rError)
 	{
-		if (i_Expression.empty() || IsPlainNumber(i_Expression))
+		if (i_Expression.empty())
 			return true;
-		const std::string_view tail =
-		    i_Expression.substr(std::min(i_Expression.find_first_of("+-*/", 1), i_Expression.size()));
-		const std::string_view number = i_Expression.substr(0, i_Expression.size() - tail.size());
+		const auto isOperator = [](char i_Byte)
+		{ return i_Byte == '+' || i_Byte == '-' || i_Byte == '*' || i_Byte == '/'; };
+		const auto operation = std::find_if(i_Expression.begin() + 1, i_Expression.end(), isOperator);
+		const std::string_view number(i_Expression.begin(), operation);
+		const std::string_view tail(operation, i_Expression.end());
+		const bool bNumber = IsPlainNumber(number);
+		if (bNumber && tail.empty())
+			return true;
 		// Zero may make a term vanish that would be refused otherwise.
 		const bool bKnowable =
-		    !tail.empty() && IsPlainNumber(number) && number.find_first_of("123456789") != std::string_view::npos;
-		if (bKnowable && m_FineTails.contains(std::string(tail)))
+		    bNumber && std::ranges::any_of(number, [](char i_Byte) { return i_Byte >= '1' && i_Byte <= '9'; });
+		if (bKnowable && m_FineTails.contains(tail))
 			return true;
 		double value = 0.0;
 		const bool bFine = m_rParser.Evaluate(i_Expression, value, o_rError);
@@ -75,7 +80,7 @@ public:
 
 private:
 	VDynamicExpressionParserSimple& m_rParser;
-	std::unordered_set<std::string> m_FineTails;
+	std::set<std::string, std::less<>> m_FineTails;
 };
 
 /// Files up to 3.1 tell where the segment stands in the joint's frame.

@@ -2,6 +2,7 @@
 
 #include "math/NumberText.h"
 
+#include <boost/container/small_vector.hpp>
 #include <boost/format.hpp>
 
 #include <algorithm>
@@ -19,21 +20,19 @@ bool IsSpace(char i_Byte)
 	return i_Byte == ' ' || (i_Byte >= '\t' && i_Byte <= '\r');
 }
 
+std::string_view AfterSpace(std::string_view i_Text)
+{
+	return {std::find_if_not(i_Text.begin(), i_Text.end(), IsSpace), i_Text.end()};
+}
+
 /// Takes the next part off the text's front; empty at the end.
 std::string_view TakePart(std::string_view& io_rText)
 {
-	const char* const pEnd = io_rText.data() + io_rText.size();
-	const char* const pBegin = std::find_if_not(io_rText.data(), pEnd, IsSpace);
-	const char* const pStop = std::find_if(pBegin, pEnd, IsSpace);
-	io_rText = {pStop, pEnd};
-	return {pBegin, pStop};
-}
-
-/// The text of an attribute while it is converted; kept between calls for its memory.
-std::string& Scratch()
-{
-	thread_local std::string s_Text;
-	return s_Text;
+	io_rText = AfterSpace(io_rText);
+	const auto stop = std::find_if(io_rText.begin(), io_rText.end(), IsSpace);
+	const std::string_view part(io_rText.begin(), stop);
+	io_rText = {stop, io_rText.end()};
+	return part;
 }
 
 template <typename T>
@@ -54,10 +53,10 @@ bool ToInteger(std::string_view i_Text, T& o_rValue)
 template <typename T>
 bool ReadSingle(INode& io_rNode, const VAttribute& i_rAttribute, T& o_rValue)
 {
-	std::string& rText = Scratch();
-	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
+	std::string_view text;
+	if (!ReadAttribute(io_rNode, i_rAttribute, text))
 		return false;
-	if (ToValue(rText, o_rValue))
+	if (ToValue(text, o_rValue))
 		return true;
 	AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
 	return false;
@@ -83,18 +82,20 @@ bool TakeValue(std::string_view& io_rText, std::int32_t& o_rValue)
 	return true;
 }
 
+constexpr auto TakeReal = [](std::string_view& io_rText, std::size_t, double& o_rValue)
+{ return TakeValue(io_rText, o_rValue); };
+
 /// @param i_rTake takes a value off the text's front, or returns false without taking anything.
 template <typename T, typename TTake>
 bool ReadValues(
     INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, T* o_pValues, const TTake& i_rTake)
 {
-	std::string& rText = Scratch();
-	if (!ReadAttribute(io_rNode, i_rAttribute, rText))
+	std::string_view rest;
+	if (!ReadAttribute(io_rNode, i_rAttribute, rest))
 		return false;
-	std::string_view rest = rText;
 	bool bAllTaken = true;
 	std::size_t count = 0;
-	while (std::find_if_not(rest.begin(), rest.end(), IsSpace) != rest.end())
+	while (!(rest = AfterSpace(rest)).empty())
 	{
 		if (count < i_Count && i_rTake(rest, count, o_pValues[count]))
 			++count;
@@ -199,10 +200,19 @@ void AddIncorrectCount(INode& io_rNode, std::string_view i_Attribute)
 	                      .str());
 }
 
-bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, std::string& o_rValue)
+bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, std::string_view& o_rValue)
 {
 	return io_rNode.ProcessAttribute(i_rAttribute.m_Name, o_rValue, i_rAttribute.m_Doc, i_rAttribute.m_SchemaType,
 	    i_rAttribute.m_bRequired, i_rAttribute.m_Minimum, i_rAttribute.m_Maximum);
+}
+
+bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, std::string& o_rValue)
+{
+	std::string_view text;
+	if (!ReadAttribute(io_rNode, i_rAttribute, text))
+		return false;
+	o_rValue = text;
+	return true;
 }
 
 bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, double& o_rValue)
@@ -238,8 +248,7 @@ bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, VVersion& o_
 bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, std::vector<double>& io_rTarget,
     std::size_t i_Offset)
 {
-	return ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset,
-	    [](std::string_view& io_rText, std::size_t, double& o_rValue) { return TakeValue(io_rText, o_rValue); });
+	return ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset, TakeReal);
 }
 
 bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count,
@@ -251,8 +260,8 @@ bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Cou
 
 bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, double* o_pTarget)
 {
-	std::vector<double> values;
-	if (!ReadList(io_rNode, i_rAttribute, i_Count, values))
+	boost::container::small_vector<double, 9> values(i_Count);
+	if (!ReadValues(io_rNode, i_rAttribute, i_Count, values.data(), TakeReal))
 		return false;
 	std::copy(values.begin(), values.end(), o_pTarget);
 	return true;

@@ -48,6 +48,8 @@ void AddIncorrectCount(INode& io_rNode, std::string_view i_Attribute);
 /// All readers below return true if the attribute was present and converted; otherwise the value is left as it was,
 /// and a text that does not convert has added an error.
 
+/// The text as it stands in the document, which must outlive it.
+bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, std::string_view& o_rValue);
 bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, std::string& o_rValue);
 bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, double& o_rValue);
 bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, std::int32_t& o_rValue);
@@ -63,7 +65,7 @@ bool ReadAttribute(INode& io_rNode, VAttribute i_Attribute, const VEnum<T>& i_rE
 {
 	io_rNode.DeclareEnum(i_rEnum);
 	i_Attribute.m_SchemaType = i_rEnum.GetName();
-	std::string text;
+	std::string_view text;
 	if (!ReadAttribute(io_rNode, i_Attribute, text))
 		return false;
 	if (i_rEnum.ToValue(text, o_rValue))

@@ -1,24 +1,27 @@
 #include "UtilsRapidXml/Characters.h"
 
-#include <cstdint>
-#include <cstring>
+#include <algorithm>
+#include <cstddef>
 
 namespace
 {
 
-constexpr std::uint64_t c_Ones = 0x0101010101010101u;
-
-/// Words of eight bytes of which none is a control character or part of a longer sequence: nearly all of any file.
-bool AllPlain(const char* i_pBytes, std::size_t i_Words)
+/// Neither a control character nor part of a longer sequence.
+bool IsPlain(char i_Byte)
 {
-	std::uint64_t found = 0;
-	for (std::size_t i = 0; i < i_Words; ++i)
-	{
-		std::uint64_t word;
-		std::memcpy(&word, i_pBytes + sizeof(word) * i, sizeof(word));
-		found |= (word - c_Ones * 0x20) | word;
-	}
-	return (found & (c_Ones * 0x80)) == 0;
+	return static_cast<signed char>(i_Byte) >= 0x20;
+}
+
+/// Bytes looked at together.
+constexpr std::size_t c_Block = 32;
+
+/// True for nearly all of any file. All bytes are looked at, whatever is found: compilers make few instructions of it.
+bool IsPlainBlock(const char* i_pBytes)
+{
+	unsigned char found = 0;
+	for (std::size_t i = 0; i < c_Block; ++i)
+		found |= static_cast<unsigned char>(!IsPlain(i_pBytes[i]));
+	return found == 0;
 }
 
 /// The length of the sequence that begins here, 0 if it is broken or no character of XML.
@@ -47,21 +50,16 @@ std::size_t UtilsRapidXml::FindBrokenCharacter(std::string_view i_Text)
 	std::size_t position = 0;
 	while (position < i_Text.size())
 	{
-		// Four words at once are few instructions.
-		if (i_Text.size() - position >= 32 && AllPlain(i_Text.data() + position, 4))
+		const std::size_t end = std::min(position + c_Block, i_Text.size());
+		if (end - position == c_Block && IsPlainBlock(i_Text.data() + position))
+			position = end;
+		while (position < end)
 		{
-			position += 32;
-			continue;
+			const std::size_t length = IsPlain(i_Text[position]) ? 1 : SequenceLength(i_Text.substr(position));
+			if (length == 0)
+				return position;
+			position += length;
 		}
-		if (i_Text.size() - position >= 8 && AllPlain(i_Text.data() + position, 1))
-		{
-			position += 8;
-			continue;
-		}
-		const std::size_t length = SequenceLength(i_Text.substr(position));
-		if (length == 0)
-			return position;
-		position += length;
 	}
 	return std::string_view::npos;
 }

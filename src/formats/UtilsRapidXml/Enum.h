@@ -1,7 +1,9 @@
 #pragma once
 
+#include <functional>
 #include <map>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace UtilsRapidXml
@@ -31,9 +33,9 @@ public:
 		return *this;
 	}
 
-	bool ToValue(const std::string& i_rText, T& o_rValue) const
+	bool ToValue(std::string_view i_Text, T& o_rValue) const
 	{
-		const auto it = m_TextToValue.find(i_rText);
+		const auto it = m_TextToValue.find(i_Text);
 		if (it == m_TextToValue.end())
 			return false;
 		o_rValue = it->second;
@@ -61,7 +63,7 @@ public:
 
 private:
 	std::string m_Name;
-	std::map<std::string, T> m_TextToValue;
+	std::map<std::string, T, std::less<>> m_TextToValue;
 	std::map<T, std::string> m_ValueToText;
 };
 

@@ -38,8 +38,8 @@ public:
 	/// Acts on the pending list, then empties it. With i_bChoice exactly one of the pending elements may stand.
 	virtual void ProcessElements(const std::function<void(INode&)>& i_rCallback, bool i_bChoice = false) = 0;
 
-	/// @return true if the attribute's text is in o_rText.
-	virtual bool ProcessAttribute(std::string_view i_Name, std::string& o_rText, std::string_view i_Doc,
+	/// @return true if the attribute's text is in o_rText; it lasts as long as the document.
+	virtual bool ProcessAttribute(std::string_view i_Name, std::string_view& o_rText, std::string_view i_Doc,
 	    std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum = {}, VVersion i_Maximum = {}) = 0;
 
 	virtual void AddError(const std::string& i_rText) = 0;

@@ -103,13 +103,15 @@ void VReaderNode::Match(const VDeclaration& i_rDeclaration, bool i_bChoice, std:
 	const auto path = [this] { return Path(m_pElement); };
 	std::uint32_t count = 0;
 	std::size_t position = 0;
+	bool bRecognised = Contains(m_pNotes->m_RecognisedChildren, i_rDeclaration.m_Name);
 	for (VXmlNode* pChild = m_pElement->first_node(); pChild; pChild = pChild->next_sibling(), ++position)
 	{
 		const std::string_view name = UtilsRapidXml::Name(pChild);
 		if (name != i_rDeclaration.m_Name)
 			continue;
-		if (!Contains(m_pNotes->m_RecognisedChildren, name))
+		if (!bRecognised)
 			m_pNotes->m_RecognisedChildren.push_back(name);
+		bRecognised = true;
 		const auto childPath = [pChild] { return Path(pChild); };
 		if (!InRange(GetVersion(), i_rDeclaration.m_Minimum, i_rDeclaration.m_Maximum))
 		{
@@ -175,7 +177,7 @@ void VReaderNode::ProcessElements(const std::function<void(INode&)>& i_rCallback
 	}
 }
 
-bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string& o_rText, std::string_view,
+bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string_view& o_rText, std::string_view,
     std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum, VVersion i_Maximum)
 {
 	// Attributes nearly always stand in the order in which they are asked for: the search goes on where the last one

@@ -72,7 +72,7 @@ public:
 	void DeclareElement(std::string_view i_Name, std::string_view i_Doc, std::uint32_t i_MinimumCount,
 	    std::uint32_t i_MaximumCount, VVersion i_Minimum = {}, VVersion i_Maximum = {}) override;
 	void ProcessElements(const std::function<void(INode&)>& i_rCallback, bool i_bChoice = false) override;
-	bool ProcessAttribute(std::string_view i_Name, std::string& o_rText, std::string_view i_Doc,
+	bool ProcessAttribute(std::string_view i_Name, std::string_view& o_rText, std::string_view i_Doc,
 	    std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum = {}, VVersion i_Maximum = {}) override;
 	void AddError(const std::string& i_rText) override { m_pGlobal->m_Errors.Add(i_rText); }
 	void AddWarning(const std::string& i_rText) override { m_pGlobal->m_Warnings.Add(i_rText); }

@@ -110,7 +110,7 @@ void VSchemaNode::ProcessElements(const std::function<void(INode&)>& i_rCallback
 	}
 }
 
-bool VSchemaNode::ProcessAttribute(std::string_view i_Name, std::string&, std::string_view i_Doc,
+bool VSchemaNode::ProcessAttribute(std::string_view i_Name, std::string_view&, std::string_view i_Doc,
     std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum, VVersion i_Maximum)
 {
 	m_Attributes.push_back(

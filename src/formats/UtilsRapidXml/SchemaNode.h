@@ -45,7 +45,7 @@ public:
 	    std::uint32_t i_MaximumCount, VVersion i_Minimum = {}, VVersion i_Maximum = {}) override;
 	void ProcessElements(const std::function<void(INode&)>& i_rCallback, bool i_bChoice = false) override;
 	/// @return false always: there is no value.
-	bool ProcessAttribute(std::string_view i_Name, std::string& o_rText, std::string_view i_Doc,
+	bool ProcessAttribute(std::string_view i_Name, std::string_view& o_rText, std::string_view i_Doc,
 	    std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum = {}, VVersion i_Maximum = {}) override;
 	/// Findings about values have no place in a schema; they are only counted.
 	void AddError(const std::string&) override { ++m_pInfo->m_ErrorCount; }

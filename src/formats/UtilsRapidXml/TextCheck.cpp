@@ -47,26 +47,14 @@ bool IsInName(char i_Byte, unsigned char i_Place)
 	return (c_NameBytes[static_cast<unsigned char>(i_Byte)] & i_Place) != 0;
 }
 
-/// What a quoted value must be looked at for: its end, the text's end, references, and what becomes a blank.
-constexpr auto c_EndsPlain = []
+/// True if a quoted value has no reference and nothing that becomes a blank: nearly all of any file. All bytes are
+/// looked at, whatever is found: compilers make few instructions of it.
+bool IsPlainValue(std::string_view i_Value)
 {
-	std::array<bool, 256> ends{};
-	for (const unsigned char byte : {'\0', '"', '\'', '&', '\t', '\n', '\r'})
-		ends[byte] = true;
-	return ends;
-}();
-
-/// Eight bytes of which none ends the plain part of a quoted value: most of any file.
-bool AllInsideValue(const char* i_pBytes)
-{
-	constexpr std::uint64_t c_Ones = 0x0101010101010101u;
-	constexpr std::uint64_t c_Highs = 0x8080808080808080u;
-	std::uint64_t word;
-	std::memcpy(&word, i_pBytes, sizeof(word));
-	const auto hasZero = [](std::uint64_t i_Word) { return (i_Word - c_Ones) & ~i_Word & c_Highs; };
-	const std::uint64_t controls = (word - c_Ones * 0x20) & ~word & c_Highs;
-	// "&" and "'" differ in the lowest bit.
-	return (controls | hasZero(word ^ c_Ones * '"') | hasZero((word | c_Ones) ^ c_Ones * '\'')) == 0;
+	unsigned char found = 0;
+	for (const unsigned char byte : i_Value)
+		found |= static_cast<unsigned char>(byte < 0x20) | static_cast<unsigned char>(byte == '&');
+	return found == 0;
 }
 
 class VTextCheck
@@ -124,6 +112,7 @@ private:
 	bool Opening();
 	bool Closing();
 	bool Attribute();
+	bool Value(char* i_pBegin, char* i_pEnd);
 	bool DuplicateAttribute();
 	bool Text(const char* i_pBegin, const char* i_pEnd);
 	bool Reference(const char* i_pAt);
@@ -240,29 +229,31 @@ bool VTextCheck::Attribute()
 		return Fail(m_p, "value of attribute " + std::string(name) + " is not quoted");
 	const char quote = *m_p++;
 	char* const pBegin = m_p;
-	for (;; ++m_p)
-	{
-		while (m_pEnd - m_p >= 8 && AllInsideValue(m_p))
-			m_p += 8;
-		while (!c_EndsPlain[static_cast<unsigned char>(*m_p)])
-			++m_p;
-		if (m_p == m_pEnd)
-			return Fail(pBegin, "value of attribute " + std::string(name) + " does not end");
-		if (*m_p == quote)
-			break;
-		if (*m_p == '&')
-		{
-			if (!Reference(m_p))
-				return false;
-		}
-		else if (IsSpace(*m_p))
-		{
-			m_LineEndsReplaced += *m_p == '\n';
-			*m_p = ' ';
-		}
-	}
+	char* const pQuote = static_cast<char*>(std::memchr(pBegin, quote, m_pEnd - pBegin));
+	m_p = pQuote ? pQuote : m_pEnd;
+	if (!IsPlainValue({pBegin, m_p}) && !Value(pBegin, m_p))
+		return false;
+	if (!pQuote)
+		return Fail(pBegin, "value of attribute " + std::string(name) + " does not end");
 	++m_p;
 	SkipSpace();
+	return true;
+}
+
+/// Checks references, and turns white space into blanks.
+bool VTextCheck::Value(char* i_pBegin, char* i_pEnd)
+{
+	for (char* p = i_pBegin; p != i_pEnd; ++p)
+		if (*p == '&')
+		{
+			if (!Reference(p))
+				return false;
+		}
+		else if (IsSpace(*p))
+		{
+			m_LineEndsReplaced += *p == '\n';
+			*p = ' ';
+		}
 	return true;
 }
 
