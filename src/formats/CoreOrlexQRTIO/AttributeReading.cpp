@@ -4,6 +4,8 @@
 
 #include "math/NumberText.h"
 
+#include <boost/container/small_vector.hpp>
+
 #include <algorithm>
 #include <cmath>
 
@@ -35,17 +37,20 @@ bool ReadExpressions(INode& io_rNode, const VAttribute& i_rAttribute, std::span<
 	std::string_view text;
 	if (!ReadAttribute(io_rNode, i_rAttribute, text))
 		return false;
-	text = Trimmed(text);
+	boost::container::small_vector<std::string_view, 9> expressions;
 	std::size_t count = 0;
-	for (std::string_view rest = text; !rest.empty(); ++count)
-		TakeExpression(rest);
+	for (std::string_view rest = Trimmed(text); !rest.empty(); ++count)
+	{
+		const std::string_view expression = TakeExpression(rest);
+		if (count < o_Expressions.size())
+			expressions.push_back(expression);
+	}
 	if (count != o_Expressions.size())
 	{
 		UtilsRapidXml::AddIncorrectCount(io_rNode, i_rAttribute.m_Name);
 		return false;
 	}
-	for (std::string& rExpression : o_Expressions)
-		rExpression = TakeExpression(text);
+	std::ranges::copy(expressions, o_Expressions.begin());
 	return true;
 }
 

@@ -82,8 +82,6 @@ void FormatMarker(INode& io_rNode, VReading& io_rReading)
 			io_rNode.AddError(
 			    (boost::format("Marker %1% is using unknown segment %2%") % rMarker.m_Name % segment).str());
 	}
-	rTarget.m_Type = VSubjectParametrised::VTarget::ELocalPointToWorldPoint;
-	rTarget.m_MarkerIndices.push_back(index);
 	rTarget.m_StateExpressions.assign(3, "0");
 	bPosition = ReadExpressions(io_rNode, Table::c_Position, rTarget.m_StateExpressions);
 	ReadList(io_rNode, Table::c_Covariance, 9, rTarget.m_Covariance);
@@ -99,13 +97,15 @@ void FormatMarker(INode& io_rNode, VReading& io_rReading)
 	Rotation::VVector3 normal{};
 	if (ReadList(io_rNode, Table::c_ViewNormal, 3, normal.data()) && Length(normal) >= c_ShortestNormal)
 		normal = Normalised(normal);
-	rTarget.m_ViewNormals.push_back(normal);
 	ReadAttribute(io_rNode, Table::c_ViewAngle, rMarker.m_ViewAngle);
 
 	if (io_rNode.GetErrorCount() != errors)
 		return;
 	if (bOnSegment)
 	{
+		rTarget.m_Type = VSubjectParametrised::VTarget::ELocalPointToWorldPoint;
+		rTarget.m_MarkerIndices.push_back(index);
+		rTarget.m_ViewNormals.push_back(normal);
 		VSubjectApplicationData::VTarget applicationData;
 		applicationData.m_Name = rMarker.m_Name;
 		applicationData.m_Colour = rApplicationData.m_Colour;

@@ -42,7 +42,7 @@ VDocument::~VDocument() = default;
 
 bool VDocument::Parse(std::string i_Text, std::string& o_rError)
 {
-	m_pContent = std::make_unique_for_overwrite<VContent>();
+	m_pContent->m_Document.clear();
 	if (!CheckText(i_Text, o_rError))
 		return false;
 	m_pContent->m_Text = std::move(i_Text);
@@ -58,7 +58,7 @@ bool VDocument::Parse(std::string i_Text, std::string& o_rError)
 	{
 		o_rError = rError.what();
 	}
-	m_pContent = std::make_unique_for_overwrite<VContent>();
+	m_pContent->m_Document.clear();
 	return false;
 }
 
