@@ -218,15 +218,14 @@ bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string_view& o_
 			m_pGlobal->m_Errors.Add("%1% element missing required attribute %2%", m_Name, i_Name);
 		return false;
 	}
-	const std::string_view value(pAttribute->value(), pAttribute->value_size());
+	o_rText = {pAttribute->value(), pAttribute->value_size()};
 	if (i_SchemaType == "xsd:ID")
 	{
-		if (!m_pGlobal->m_Ids.insert(value).second)
-			m_pGlobal->m_Warnings.Add("File contains duplicate ID : %1% ", value);
+		if (!m_pGlobal->m_Ids.insert(o_rText).second)
+			m_pGlobal->m_Warnings.Add("File contains duplicate ID : %1% ", o_rText);
 	}
-	else if (i_SchemaType == "xsd:IDREF" && !m_pGlobal->m_Ids.contains(value))
-		m_pGlobal->m_Warnings.Add("File contains unknown IDREF : %1% ", value);
-	o_rText = value;
+	else if (i_SchemaType == "xsd:IDREF" && !m_pGlobal->m_Ids.contains(o_rText))
+		m_pGlobal->m_Warnings.Add("File contains unknown IDREF : %1% ", o_rText);
 	return true;
 }
 

@@ -91,12 +91,14 @@ private:
 
 	std::string_view TakeName()
 	{
-		const char* const pBegin = m_p;
+		char* const pBegin = m_p;
+		char* p = pBegin;
 		// The text ends with a zero byte.
-		if (IsInName(*m_p, c_StartsName))
-			while (IsInName(*m_p, c_ContinuesName))
-				++m_p;
-		return {pBegin, m_p};
+		if (IsInName(*p, c_StartsName))
+			while (IsInName(*p, c_ContinuesName))
+				++p;
+		m_p = p;
+		return {pBegin, p};
 	}
 
 	bool SkipPast(std::string_view i_End, const char* i_pWhat)
