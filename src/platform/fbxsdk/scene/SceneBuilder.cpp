@@ -4,10 +4,13 @@
 #include "fbxsdk/Limits.h"
 #include "fbxsdk/container/Values.h"
 #include "fbxsdk/document/Properties.h"
+#include "fbxsdk/scene/MaterialReader.h"
+#include "fbxsdk/sdk/Mesh.h"
 #include "fbxsdk/sdk/NodeData.h"
 #include "fbxsdk/sdk/SceneContent.h"
 
 #include <optional>
+#include <set>
 
 namespace
 {
@@ -94,11 +97,11 @@ FbxFile::VImportResult FbxFile::VSceneBuilder::Build(VFileBytes i_Bytes, const V
 	}
 	rContent.m_pDocument = std::make_unique<VDocument>(rContent.m_Tree);
 	BuildSettings();
-	const bool bAllNodes = BuildNodes(i_rKind.m_Version);
+	const bool bAll = BuildObjects(i_rKind.m_Version);
 	Connect();
 	TellUnreached();
 	for (const std::string& rError : {rContent.m_Tree.Error(), rContent.m_pDocument->Error(),
-	         std::string(bAllNodes ? "" : "it has more nodes than are read")})
+	         std::string(bAll ? "" : "it has more nodes, or parts of nodes, than are read")})
 		if (result.m_Error.empty())
 			result.m_Error = rError;
 	return result;
@@ -131,41 +134,73 @@ void FbxFile::VSceneBuilder::BuildSettings()
 	    });
 }
 
-bool FbxFile::VSceneBuilder::BuildNodes(std::uint32_t i_Version)
+template <typename T>
+T* FbxFile::VSceneBuilder::AddPart(T* i_pPart)
+{
+	m_rScene.m_pContent->m_Parts.emplace_back(i_pPart);
+	return i_pPart;
+}
+
+FbxFile::VSceneBuilder::VBuilt FbxFile::VSceneBuilder::BuildPart(
+    const VObject& i_rObject, const VMaterialReader& i_rMaterials)
+{
+	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
+	const VArraySource record{&rContent.m_Tree, &rContent.m_Budget, i_rObject.m_Element};
+	const auto name = [&] { return rContent.m_pDocument->Decoded(i_rObject.m_Name); };
+	if (i_rObject.m_Kind == "NodeAttribute")
+	{
+		if (const auto type = SkeletonType(i_rObject.m_SubKind))
+			return AddPart(new fbxsdk::FbxSkeleton(name(), *type));
+	}
+	else if (i_rObject.m_Kind == "Geometry" && i_rObject.m_SubKind == "Mesh")
+		return AddPart(new fbxsdk::FbxMesh(name(), record));
+	else if (i_rObject.m_Kind == "Deformer" && i_rObject.m_SubKind == "Skin")
+		return AddPart(new fbxsdk::FbxSkin(name()));
+	else if (i_rObject.m_Kind == "Deformer" && i_rObject.m_SubKind == "Cluster")
+		return AddPart(new fbxsdk::FbxCluster(name(), record));
+	else if (i_rObject.m_Kind == "Material")
+		return AddPart(i_rMaterials.ReadMaterial(i_rObject).release());
+	else if (i_rObject.m_Kind == "Texture")
+		return AddPart(i_rMaterials.ReadTexture(i_rObject).release());
+	return {};
+}
+
+bool FbxFile::VSceneBuilder::BuildObjects(std::uint32_t i_Version)
 {
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
 	const VDocument& rDocument = *rContent.m_pDocument;
 	VNodeTransform defaults;
 	ReadTransform(rDocument.Tree(), rDocument.Template("Model"), defaults);
-
-	const auto addSkeleton = [&](const VObject& i_rObject) -> fbxsdk::FbxSkeleton*
-	{
-		const auto type = SkeletonType(i_rObject.m_SubKind);
-		if (!type)
-			return nullptr;
-		auto* const pSkeleton = new fbxsdk::FbxSkeleton(rDocument.Decoded(i_rObject.m_Name), *type);
-		rContent.m_Attributes.emplace_back(pSkeleton);
-		return pSkeleton;
-	};
+	const VMaterialReader materials(rDocument);
 
 	m_Built.resize(rDocument.Objects().size());
+	std::size_t parts = 0;
 	for (VObjectIndex object = 0; object < rDocument.Objects().size(); ++object)
 	{
 		const VObject& rObject = rDocument.Objects()[object];
-		if (rObject.m_Kind == "Model")
+		if (rObject.m_Kind != "Model")
 		{
-			if (rContent.m_Nodes.size() > Limits::c_Nodes)
+			if (rObject.m_Kind != "NodeAttribute" && parts > Limits::c_Parts)
 				return false;
-			auto* const pNode = new fbxsdk::FbxNode(rDocument.Decoded(rObject.m_Name));
-			rContent.m_Nodes.emplace_back(pNode);
-			m_Built[object].m_pNode = pNode;
-			pNode->m_pData->m_Properties = defaults;
-			ReadTransform(rDocument.Tree(), rObject.m_Element, pNode->m_pData->m_Properties);
-			if (i_Version < c_FirstVersionWithAttributes)
-				pNode->m_pData->m_pSkeleton = addSkeleton(rObject);
+			m_Built[object] = BuildPart(rObject, materials);
+			parts += rObject.m_Kind != "NodeAttribute" && m_Built[object].index() != 0 ? 1 : 0;
+			continue;
 		}
-		else if (rObject.m_Kind == "NodeAttribute")
-			m_Built[object].m_pSkeleton = addSkeleton(rObject);
+		if (rContent.m_Nodes.size() > Limits::c_Nodes)
+			return false;
+		auto* const pNode = new fbxsdk::FbxNode(rDocument.Decoded(rObject.m_Name));
+		rContent.m_Nodes.emplace_back(pNode);
+		m_Built[object] = pNode;
+		pNode->m_pData->m_Properties = defaults;
+		ReadTransform(rDocument.Tree(), rObject.m_Element, pNode->m_pData->m_Properties);
+		if (i_Version >= c_FirstVersionWithAttributes)
+			continue;
+		// Bone and mesh stand in the node itself.
+		if (const auto type = SkeletonType(rObject.m_SubKind))
+			pNode->m_pData->m_pSkeleton = AddPart(new fbxsdk::FbxSkeleton(pNode->GetName(), *type));
+		const VArraySource record{&rContent.m_Tree, &rContent.m_Budget, rObject.m_Element};
+		if (rObject.m_SubKind == "Mesh" && record.Child("Vertices").m_Element != c_NoElement)
+			pNode->m_pData->m_pMesh = AddPart(new fbxsdk::FbxMesh(pNode->GetName(), record));
 	}
 	return true;
 }
@@ -173,36 +208,84 @@ bool FbxFile::VSceneBuilder::BuildNodes(std::uint32_t i_Version)
 void FbxFile::VSceneBuilder::Connect()
 {
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
-	const fbxsdk::FbxNode* pSecondParent = nullptr;
-	std::size_t secondParents = 0;
+	const VBuilt root = rContent.m_Nodes.front().get();
+	// Repeated connections of parts count once.
+	std::set<std::tuple<VObjectIndex, VObjectIndex, std::string_view>> seen;
 	for (const VConnection& rConnection : rContent.m_pDocument->Connections())
 	{
-		if (!rConnection.m_Property.empty() || rConnection.m_Child == c_SceneObject)
+		if (rConnection.m_Child == c_SceneObject)
 			continue;
-		fbxsdk::FbxNode* const pParent = rConnection.m_Parent == c_SceneObject ? rContent.m_Nodes.front().get()
-		                                                                       : m_Built[rConnection.m_Parent].m_pNode;
+		const VBuilt& rParent = rConnection.m_Parent == c_SceneObject ? root : m_Built[rConnection.m_Parent];
 		const VBuilt& rChild = m_Built[rConnection.m_Child];
-		if (!pParent)
-			continue;
-		if (rChild.m_pSkeleton && !pParent->m_pData->m_pSkeleton)
-			pParent->m_pData->m_pSkeleton = rChild.m_pSkeleton;
-		if (!rChild.m_pNode)
-			continue;
-		if (!rChild.m_pNode->m_pData->m_pParent)
-		{
-			rChild.m_pNode->m_pData->m_pParent = pParent;
-			pParent->m_pData->m_Children.push_back(rChild.m_pNode);
-		}
-		else if (rChild.m_pNode->m_pData->m_pParent != pParent)
-		{
-			++secondParents;
-			pSecondParent = rChild.m_pNode;
-		}
+		auto* const* const pParent = std::get_if<fbxsdk::FbxNode*>(&rParent);
+		auto* const* const pChild = std::get_if<fbxsdk::FbxNode*>(&rChild);
+		if (pParent && pChild && rConnection.m_Property.empty())
+			ConnectNodes(**pChild, **pParent);
+		else if (rChild.index() != 0 && rParent.index() != 0
+		    && seen.emplace(rConnection.m_Child, rConnection.m_Parent, rConnection.m_Property).second)
+			ConnectParts(rChild, rParent, rConnection.m_Property);
 	}
-	if (secondParents > 0)
+	for (const VTextureOfNode& rTexture : m_TexturesOfNodes)
+		for (fbxsdk::FbxSurfaceMaterial* const pMaterial : rTexture.m_pNode->m_pData->m_Materials)
+			VMaterialReader::Connect(*rTexture.m_pTexture, *pMaterial, "DiffuseColor");
+	if (m_SecondParents > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
-		    "Connections left out because their node has another parent: %1%, such as that of %2%", secondParents,
-		    pSecondParent->GetName());
+		    "Connections left out because their node has another parent: %1%, such as that of %2%", m_SecondParents,
+		    m_pSecondParent->GetName());
+}
+
+void FbxFile::VSceneBuilder::ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::FbxNode& io_rParent)
+{
+	if (!io_rChild.m_pData->m_pParent)
+	{
+		io_rChild.m_pData->m_pParent = &io_rParent;
+		io_rParent.m_pData->m_Children.push_back(&io_rChild);
+	}
+	else if (io_rChild.m_pData->m_pParent != &io_rParent)
+	{
+		++m_SecondParents;
+		m_pSecondParent = &io_rChild;
+	}
+}
+
+void FbxFile::VSceneBuilder::ConnectParts(
+    const VBuilt& i_rChild, const VBuilt& i_rParent, std::string_view i_Property)
+{
+	using namespace fbxsdk;
+	const auto child = [&]<typename T>(T*) { return std::holds_alternative<T*>(i_rChild) ? std::get<T*>(i_rChild) : nullptr; };
+	const auto parent = [&]<typename T>(T*) { return std::holds_alternative<T*>(i_rParent) ? std::get<T*>(i_rParent) : nullptr; };
+	constexpr FbxNode* c_pNode = nullptr;
+	constexpr FbxMesh* c_pMesh = nullptr;
+	constexpr FbxSkin* c_pSkin = nullptr;
+	constexpr FbxCluster* c_pCluster = nullptr;
+	constexpr FbxSurfaceMaterial* c_pMaterial = nullptr;
+	constexpr FbxFileTexture* c_pTexture = nullptr;
+	if (!i_Property.empty())
+	{
+		if (child(c_pTexture) && parent(c_pMaterial))
+			VMaterialReader::Connect(*child(c_pTexture), *parent(c_pMaterial), i_Property);
+		return;
+	}
+	if (FbxNode* const pNode = parent(c_pNode))
+	{
+		FbxNode::VData& rData = *pNode->m_pData;
+		if (FbxSkeleton* const pSkeleton = child(static_cast<FbxSkeleton*>(nullptr)); pSkeleton && !rData.m_pSkeleton)
+			rData.m_pSkeleton = pSkeleton;
+		else if (FbxMesh* const pMesh = child(c_pMesh); pMesh && !rData.m_pMesh)
+			rData.m_pMesh = pMesh;
+		else if (FbxSurfaceMaterial* const pMaterial = child(c_pMaterial))
+			rData.m_Materials.push_back(pMaterial);
+		else if (FbxSkin* const pSkin = child(c_pSkin); pSkin && rData.m_pMesh)
+			rData.m_pMesh->m_Skins.push_back(pSkin);
+		else if (FbxFileTexture* const pTexture = child(c_pTexture))
+			m_TexturesOfNodes.push_back({pTexture, pNode});
+	}
+	else if (child(c_pSkin) && parent(c_pMesh))
+		parent(c_pMesh)->m_Skins.push_back(child(c_pSkin));
+	else if (child(c_pCluster) && parent(c_pSkin))
+		parent(c_pSkin)->m_Clusters.push_back(child(c_pCluster));
+	else if (child(c_pNode) && parent(c_pCluster) && !parent(c_pCluster)->m_pLink)
+		parent(c_pCluster)->m_pLink = child(c_pNode);
 }
 
 void FbxFile::VSceneBuilder::TellUnreached()

@@ -4,13 +4,19 @@
 #include "fbxsdk/container/FileKind.h"
 
 #include <string>
+#include <variant>
 #include <vector>
 
 namespace fbxsdk
 {
+class FbxCluster;
+class FbxFileTexture;
+class FbxMesh;
 class FbxNode;
 class FbxScene;
 class FbxSkeleton;
+class FbxSkin;
+class FbxSurfaceMaterial;
 } // namespace fbxsdk
 
 namespace FbxFile
@@ -39,21 +45,34 @@ public:
 
 private:
 	void BuildSettings();
-	/// False if there are more than c_Nodes.
-	bool BuildNodes(std::uint32_t i_Version);
+	/// False if there are more than c_Nodes or c_Parts.
+	bool BuildObjects(std::uint32_t i_Version);
 	void Connect();
+	void ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::FbxNode& io_rParent);
 	void TellUnreached();
 
-	/// What was made of an object: at most one of the two.
-	struct VBuilt
+	/// What was made of an object.
+	using VBuilt = std::variant<std::monostate, fbxsdk::FbxNode*, fbxsdk::FbxSkeleton*, fbxsdk::FbxMesh*,
+	    fbxsdk::FbxSkin*, fbxsdk::FbxCluster*, fbxsdk::FbxSurfaceMaterial*, fbxsdk::FbxFileTexture*>;
+	struct VTextureOfNode
 	{
-		fbxsdk::FbxNode* m_pNode = nullptr;
-		fbxsdk::FbxSkeleton* m_pSkeleton = nullptr;
+		fbxsdk::FbxFileTexture* m_pTexture;
+		fbxsdk::FbxNode* m_pNode;
 	};
+
+	/// Keeps the part and gives it back.
+	template <typename T>
+	T* AddPart(T* i_pPart);
+	VBuilt BuildPart(const struct VObject& i_rObject, const class VMaterialReader& i_rMaterials);
+	void ConnectParts(const VBuilt& i_rChild, const VBuilt& i_rParent, std::string_view i_Property);
 
 	fbxsdk::FbxScene& m_rScene;
 	/// By object.
 	std::vector<VBuilt> m_Built;
+	/// Before version 7 textures are connected to nodes, whose materials may follow.
+	std::vector<VTextureOfNode> m_TexturesOfNodes;
+	const fbxsdk::FbxNode* m_pSecondParent = nullptr;
+	std::size_t m_SecondParents = 0;
 };
 
 } // namespace FbxFile

@@ -16,6 +16,12 @@ void fbxsdk::FbxAMatrix::SetIdentity()
 	FbxFile::Store(VAffine(), *this);
 }
 
+void fbxsdk::FbxAMatrix::SetT(const FbxVector4& pT)
+{
+	for (int i = 0; i < 3; ++i)
+		mData[3][i] = pT[i];
+}
+
 fbxsdk::FbxAMatrix fbxsdk::FbxAMatrix::operator*(const FbxAMatrix& pOther) const
 {
 	FbxAMatrix product;

@@ -4,6 +4,30 @@ namespace fbxsdk
 {
 
 template <typename T>
+class FbxVectorTemplate2
+{
+public:
+	FbxVectorTemplate2() = default;
+	FbxVectorTemplate2(const T& pData0, const T& pData1) : mData{pData0, pData1} {}
+	T& operator[](int pIndex) { return mData[pIndex]; }
+	const T& operator[](int pIndex) const { return mData[pIndex]; }
+
+	T mData[2]{};
+};
+
+template <typename T>
+class FbxVectorTemplate3
+{
+public:
+	FbxVectorTemplate3() = default;
+	FbxVectorTemplate3(const T& pData0, const T& pData1, const T& pData2) : mData{pData0, pData1, pData2} {}
+	T& operator[](int pIndex) { return mData[pIndex]; }
+	const T& operator[](int pIndex) const { return mData[pIndex]; }
+
+	T mData[3]{};
+};
+
+template <typename T>
 class FbxVectorTemplate4
 {
 public:
@@ -18,8 +42,17 @@ public:
 	T mData[4]{};
 };
 
+using FbxDouble = double;
+using FbxDouble2 = FbxVectorTemplate2<double>;
+using FbxDouble3 = FbxVectorTemplate3<double>;
 using FbxDouble4 = FbxVectorTemplate4<double>;
 using FbxDouble4x4 = FbxVectorTemplate4<FbxDouble4>;
+
+class FbxVector2 : public FbxDouble2
+{
+public:
+	using FbxDouble2::FbxDouble2;
+};
 
 class FbxVector4 : public FbxDouble4
 {
@@ -43,6 +76,11 @@ public:
 
 	/// The stored entry in row pY and column pX.
 	double Get(int pY, int pX) const { return mData[pY][pX]; }
+
+	FbxVector4 GetT() const { return {mData[3][0], mData[3][1], mData[3][2], mData[3][3]}; }
+
+	/// The fourth component is left out: the map stays affine.
+	void SetT(const FbxVector4& pT);
 
 	FbxAMatrix operator*(const FbxAMatrix& pOther) const;
 

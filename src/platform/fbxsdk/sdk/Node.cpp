@@ -1,6 +1,7 @@
 #include "fbxsdk/sdk/Node.h"
 
 #include "DebugServices/Assert.h"
+#include "fbxsdk/sdk/Mesh.h"
 #include "fbxsdk/sdk/NodeData.h"
 
 fbxsdk::FbxNode::FbxNode(std::string i_Name) : FbxObject(std::move(i_Name)), m_pData(std::make_unique<VData>()) {}
@@ -38,6 +39,40 @@ fbxsdk::FbxNode* fbxsdk::FbxNode::GetChild(int pIndex)
 fbxsdk::FbxSkeleton* fbxsdk::FbxNode::GetSkeleton()
 {
 	return m_pData->m_pSkeleton;
+}
+
+int fbxsdk::FbxNode::GetNodeAttributeCount() const
+{
+	return int(m_pData->m_pSkeleton != nullptr) + int(m_pData->m_pMesh != nullptr);
+}
+
+fbxsdk::FbxNodeAttribute* fbxsdk::FbxNode::GetNodeAttributeByIndex(int pIndex)
+{
+	if (pIndex < 0 || pIndex >= GetNodeAttributeCount())
+		return nullptr;
+	return pIndex == 0 && m_pData->m_pSkeleton ? static_cast<FbxNodeAttribute*>(m_pData->m_pSkeleton)
+	                                           : m_pData->m_pMesh;
+}
+
+fbxsdk::FbxMesh* fbxsdk::FbxNode::GetMesh()
+{
+	return m_pData->m_pMesh && m_pData->m_pMesh->IsSound() ? m_pData->m_pMesh : nullptr;
+}
+
+fbxsdk::FbxGeometry* fbxsdk::FbxNode::GetGeometry()
+{
+	return m_pData->m_pMesh;
+}
+
+int fbxsdk::FbxNode::GetMaterialCount() const
+{
+	return int(m_pData->m_Materials.size());
+}
+
+fbxsdk::FbxSurfaceMaterial* fbxsdk::FbxNode::GetMaterial(int pIndex) const
+{
+	const bool bValid = pIndex >= 0 && pIndex < GetMaterialCount();
+	return bValid ? m_pData->m_Materials[pIndex] : nullptr;
 }
 
 fbxsdk::FbxVector4 fbxsdk::FbxNode::GetPreRotation(EPivotSet pPivotSet) const

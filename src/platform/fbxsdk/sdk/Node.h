@@ -14,6 +14,10 @@ class VSceneBuilder;
 namespace fbxsdk
 {
 
+class FbxGeometry;
+class FbxMesh;
+class FbxSurfaceMaterial;
+
 /// What a node is, beyond its place in the scene.
 class FbxNodeAttribute : public FbxObject
 {
@@ -78,6 +82,19 @@ public:
 
 	/// Null if the node is no bone.
 	FbxSkeleton* GetSkeleton();
+
+	/// Bone and mesh, whichever the node has.
+	int GetNodeAttributeCount() const;
+	FbxNodeAttribute* GetNodeAttributeByIndex(int pIndex);
+
+	/// Decodes the mesh. Null if the node has none, or if it is damaged.
+	FbxMesh* GetMesh();
+
+	/// Null if the node has none. Nothing of it is decoded.
+	FbxGeometry* GetGeometry();
+
+	int GetMaterialCount() const;
+	FbxSurfaceMaterial* GetMaterial(int pIndex) const;
 
 	/// In degrees, order XYZ; zero where the node's flag turns it off. Files have no destination pivots.
 	FbxVector4 GetPreRotation(EPivotSet pPivotSet) const;

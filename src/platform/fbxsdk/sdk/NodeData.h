@@ -10,6 +10,8 @@ struct fbxsdk::FbxNode::VData
 	FbxNode* m_pParent = nullptr;
 	std::vector<FbxNode*> m_Children;
 	FbxSkeleton* m_pSkeleton = nullptr;
+	FbxMesh* m_pMesh = nullptr;
+	std::vector<FbxSurfaceMaterial*> m_Materials;
 	FbxFile::VNodeTransform m_Properties;
 
 	/// All that follows is filled by the first evaluation.

@@ -22,4 +22,11 @@ private:
 	std::string m_Name;
 };
 
+/// Null if the object is not of that class.
+template <typename T>
+T* FbxCast(FbxObject* pObject)
+{
+	return dynamic_cast<T*>(pObject);
+}
+
 } // namespace fbxsdk

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "fbxsdk/container/Arrays.h"
 #include "fbxsdk/container/ElementTree.h"
 #include "fbxsdk/container/FileBytes.h"
 #include "fbxsdk/document/Document.h"
@@ -16,5 +17,7 @@ struct fbxsdk::FbxScene::VContent
 	FbxFile::VElementTree m_Tree;
 	std::unique_ptr<FbxFile::VDocument> m_pDocument;
 	std::vector<std::unique_ptr<FbxNode>> m_Nodes;
-	std::vector<std::unique_ptr<FbxNodeAttribute>> m_Attributes;
+	/// What nodes consist of: attributes, deformers, materials, textures.
+	std::vector<std::unique_ptr<FbxObject>> m_Parts;
+	FbxFile::VDecodeBudget m_Budget;
 };

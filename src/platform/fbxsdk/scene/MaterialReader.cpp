@@ -1,0 +1,162 @@
+#include "fbxsdk/scene/MaterialReader.h"
+
+#include "fbxsdk/document/Properties.h"
+
+#include <algorithm>
+
+namespace
+{
+
+using namespace FbxFile;
+using namespace fbxsdk;
+
+using VColor = FbxPropertyT<FbxDouble3>;
+using VNumber = FbxPropertyT<FbxDouble>;
+
+template <typename TClass, typename TProperty>
+struct VEntry
+{
+	std::string_view m_Name;
+	/// The name that other exporters write; empty if there is none.
+	std::string_view m_OtherName;
+	TProperty TClass::*m_pMember;
+};
+
+constexpr VEntry<FbxSurfaceLambert, VColor> c_LambertColors[]{
+    {"EmissiveColor", "Emissive", &FbxSurfaceLambert::Emissive},
+    {"AmbientColor", "Ambient", &FbxSurfaceLambert::Ambient},
+    {"DiffuseColor", "Diffuse", &FbxSurfaceLambert::Diffuse},
+    {"TransparentColor", "Transparent", &FbxSurfaceLambert::TransparentColor},
+};
+constexpr VEntry<FbxSurfaceLambert, VNumber> c_LambertNumbers[]{
+    {"EmissiveFactor", {}, &FbxSurfaceLambert::EmissiveFactor},
+    {"AmbientFactor", {}, &FbxSurfaceLambert::AmbientFactor},
+    {"DiffuseFactor", {}, &FbxSurfaceLambert::DiffuseFactor},
+    {"TransparencyFactor", {}, &FbxSurfaceLambert::TransparencyFactor},
+};
+constexpr VEntry<FbxSurfacePhong, VColor> c_PhongColors[]{
+    {"SpecularColor", "Specular", &FbxSurfacePhong::Specular},
+    {"ReflectionColor", "Reflection", &FbxSurfacePhong::Reflection},
+};
+constexpr VEntry<FbxSurfacePhong, VNumber> c_PhongNumbers[]{
+    {"SpecularFactor", {}, &FbxSurfacePhong::SpecularFactor},
+    {"ShininessExponent", "Shininess", &FbxSurfacePhong::Shininess},
+    {"ReflectionFactor", "Reflectivity", &FbxSurfacePhong::ReflectionFactor},
+};
+
+/// Calls i_Visit(entry, material of the entry's class) for each property that the material has.
+template <typename TVisit>
+void ForEachProperty(FbxSurfaceLambert& io_rMaterial, TVisit&& i_Visit)
+{
+	for (const auto& rEntry : c_LambertColors)
+		i_Visit(rEntry, io_rMaterial);
+	for (const auto& rEntry : c_LambertNumbers)
+		i_Visit(rEntry, io_rMaterial);
+	if (auto* const pPhong = FbxCast<FbxSurfacePhong>(&io_rMaterial))
+	{
+		for (const auto& rEntry : c_PhongColors)
+			i_Visit(rEntry, *pPhong);
+		for (const auto& rEntry : c_PhongNumbers)
+			i_Visit(rEntry, *pPhong);
+	}
+}
+
+void ReadNext(VValueCursor& io_rCursor, FbxDouble3& io_rValue)
+{
+	for (double& rComponent : io_rValue.mData)
+		rComponent = io_rCursor.Next().AsReal(rComponent);
+}
+
+void ReadNext(VValueCursor& io_rCursor, FbxDouble& io_rValue)
+{
+	io_rValue = io_rCursor.Next().AsReal(io_rValue);
+}
+
+bool EqualInAnyCase(std::string_view i_Text, std::string_view i_Lower)
+{
+	return std::equal(i_Text.begin(), i_Text.end(), i_Lower.begin(), i_Lower.end(),
+	    [](char i_A, char i_B) { return (i_A >= 'A' && i_A <= 'Z' ? char(i_A + 32) : i_A) == i_B; });
+}
+
+} // namespace
+
+FbxFile::VMaterialReader::VMaterialReader(const VDocument& i_rDocument)
+    : m_rDocument(i_rDocument), m_Template(i_rDocument.Template("Material"))
+{
+}
+
+std::string_view FbxFile::VMaterialReader::ShadingModel(const VObject& i_rObject) const
+{
+	const VElementTree& rTree = m_rDocument.Tree();
+	std::string_view model;
+	if (const VElementIndex record = rTree.Find(i_rObject.m_Element, "ShadingModel"); record != c_NoElement)
+		model = ValueAt(rTree, record, 0).m_Text;
+	if (model.empty())
+		VisitProperties(rTree, i_rObject.m_Element,
+		    [&model](std::string_view i_Name, VValueCursor& io_rCursor)
+		    {
+			    if (i_Name == "ShadingModel")
+				    model = io_rCursor.Next().m_Text;
+		    });
+	if (model.empty() && m_Template != c_NoElement)
+		model = ValueAt(rTree, m_Template, 0).m_Text == "FbxSurfaceLambert" ? "lambert" : "phong";
+	return model;
+}
+
+std::unique_ptr<fbxsdk::FbxSurfaceMaterial> FbxFile::VMaterialReader::ReadMaterial(const VObject& i_rObject) const
+{
+	const std::string_view model = ShadingModel(i_rObject);
+	std::string name = m_rDocument.Decoded(i_rObject.m_Name);
+	std::unique_ptr<FbxSurfaceLambert> pMaterial;
+	if (EqualInAnyCase(model, "phong"))
+		pMaterial.reset(new FbxSurfacePhong(std::move(name)));
+	else if (EqualInAnyCase(model, "lambert"))
+		pMaterial.reset(new FbxSurfaceLambert(std::move(name)));
+	else
+		return std::unique_ptr<FbxSurfaceMaterial>(new FbxSurfaceMaterial(std::move(name)));
+	ReadValues(m_Template, *pMaterial);
+	ReadValues(i_rObject.m_Element, *pMaterial);
+	return pMaterial;
+}
+
+void FbxFile::VMaterialReader::ReadValues(VElementIndex i_Properties, FbxSurfaceLambert& io_rMaterial) const
+{
+	// The other names first, so that the SDK's name wins wherever it stands.
+	for (const bool bOtherName : {true, false})
+		VisitProperties(m_rDocument.Tree(), i_Properties,
+		    [&io_rMaterial, bOtherName](std::string_view i_Name, VValueCursor& io_rCursor)
+		    {
+			    ForEachProperty(io_rMaterial,
+			        [&](const auto& i_rEntry, auto& io_rOf)
+			        {
+				        if (i_Name == (bOtherName ? i_rEntry.m_OtherName : i_rEntry.m_Name) && !i_Name.empty())
+					        ReadNext(io_rCursor, (io_rOf.*i_rEntry.m_pMember).m_Value);
+			        });
+		    });
+}
+
+std::unique_ptr<fbxsdk::FbxFileTexture> FbxFile::VMaterialReader::ReadTexture(const VObject& i_rObject) const
+{
+	const VElementTree& rTree = m_rDocument.Tree();
+	const auto text = [&](const char* i_pName) -> std::string
+	{
+		const VElementIndex record = rTree.Find(i_rObject.m_Element, i_pName);
+		return record == c_NoElement ? std::string() : m_rDocument.Decoded(ValueAt(rTree, record, 0).m_Text);
+	};
+	return std::unique_ptr<FbxFileTexture>(
+	    new FbxFileTexture(m_rDocument.Decoded(i_rObject.m_Name), text("FileName"), text("RelativeFilename")));
+}
+
+void FbxFile::VMaterialReader::Connect(
+    FbxFileTexture& i_rTexture, FbxSurfaceMaterial& io_rMaterial, std::string_view i_Property)
+{
+	auto* const pMaterial = FbxCast<FbxSurfaceLambert>(&io_rMaterial);
+	if (!pMaterial)
+		return;
+	ForEachProperty(*pMaterial,
+	    [&](const auto& i_rEntry, auto& io_rOf)
+	    {
+		    if (i_Property == i_rEntry.m_Name || (!i_Property.empty() && i_Property == i_rEntry.m_OtherName))
+			    (io_rOf.*i_rEntry.m_pMember).m_Sources.push_back(&i_rTexture);
+	    });
+}

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "fbxsdk/document/Document.h"
+#include "fbxsdk/sdk/Material.h"
+
+#include <memory>
+
+namespace FbxFile
+{
+
+/// Makes materials and textures of their records. Of a material's value the first of these counts that the file has:
+/// the property under the SDK's name, under the name that other exporters write, the template's value, the default.
+class VMaterialReader
+{
+public:
+	explicit VMaterialReader(const VDocument& i_rDocument);
+
+	std::unique_ptr<fbxsdk::FbxSurfaceMaterial> ReadMaterial(const VObject& i_rObject) const;
+	std::unique_ptr<fbxsdk::FbxFileTexture> ReadTexture(const VObject& i_rObject) const;
+
+	/// Makes the texture a source of the property of that name, if the material has it.
+	static void Connect(
+	    fbxsdk::FbxFileTexture& i_rTexture, fbxsdk::FbxSurfaceMaterial& io_rMaterial, std::string_view i_Property);
+
+private:
+	std::string_view ShadingModel(const VObject& i_rObject) const;
+	void ReadValues(VElementIndex i_Properties, fbxsdk::FbxSurfaceLambert& io_rMaterial) const;
+
+	const VDocument& m_rDocument;
+	VElementIndex m_Template;
+};
+
+} // namespace FbxFile

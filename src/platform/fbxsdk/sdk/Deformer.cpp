@@ -1,0 +1,61 @@
+#include "fbxsdk/sdk/Deformer.h"
+
+#include "DebugServices/GlobalLog.h"
+
+#include <algorithm>
+
+void fbxsdk::FbxCluster::Load() const
+{
+	if (m_bLoaded)
+		return;
+	m_bLoaded = true;
+	FbxFile::Decode(m_Record.Child("Indexes"), GetName(), m_Indices);
+	FbxFile::Decode(m_Record.Child("Weights"), GetName(), m_Weights);
+	if (m_Indices.size() != m_Weights.size())
+		NVX_LOG("FBXIO", NVX::ELogWarning, "Cluster %1% has %2% indices and %3% weights; the rest is left out",
+		    GetName(), m_Indices.size(), m_Weights.size());
+	const std::size_t count = std::min(m_Indices.size(), m_Weights.size());
+	m_Indices.resize(count);
+	m_Weights.resize(count);
+}
+
+int fbxsdk::FbxCluster::GetControlPointIndicesCount() const
+{
+	Load();
+	return int(m_Indices.size());
+}
+
+int* fbxsdk::FbxCluster::GetControlPointIndices() const
+{
+	Load();
+	return m_Indices.data();
+}
+
+double* fbxsdk::FbxCluster::GetControlPointWeights() const
+{
+	Load();
+	return m_Weights.data();
+}
+
+fbxsdk::FbxAMatrix fbxsdk::FbxCluster::Matrix(const char* i_pName) const
+{
+	FbxAMatrix matrix;
+	std::vector<double> entries;
+	FbxFile::Decode(m_Record.Child(i_pName), GetName(), entries);
+	if (entries.size() == 16)
+		for (int i = 0; i < 16; ++i)
+			if (i % 4 != 3)
+				matrix[i / 4][i % 4] = entries[i];
+	return matrix;
+}
+
+fbxsdk::FbxAMatrix& fbxsdk::FbxCluster::GetTransformMatrix(FbxAMatrix& pMatrix) const
+{
+	// Files hold it relative to the bone.
+	return pMatrix = Matrix("TransformLink") * Matrix("Transform");
+}
+
+fbxsdk::FbxAMatrix& fbxsdk::FbxCluster::GetTransformLinkMatrix(FbxAMatrix& pMatrix) const
+{
+	return pMatrix = Matrix("TransformLink");
+}

@@ -1,0 +1,69 @@
+#pragma once
+
+#include "fbxsdk/sdk/AffineMatrix.h"
+#include "fbxsdk/sdk/Property.h"
+
+namespace fbxsdk
+{
+
+/// A material of whichever shading model; those that are known are of the classes below.
+class FbxSurfaceMaterial : public FbxObject
+{
+protected:
+	friend class FbxFile::VMaterialReader;
+	using FbxObject::FbxObject;
+};
+
+/// Values start as the SDK has them for a file that does not tell.
+class FbxSurfaceLambert : public FbxSurfaceMaterial
+{
+public:
+	FbxPropertyT<FbxDouble3> Emissive{FbxDouble3(0.0, 0.0, 0.0)};
+	FbxPropertyT<FbxDouble> EmissiveFactor{1.0};
+	FbxPropertyT<FbxDouble3> Ambient{FbxDouble3(0.2, 0.2, 0.2)};
+	FbxPropertyT<FbxDouble> AmbientFactor{1.0};
+	FbxPropertyT<FbxDouble3> Diffuse{FbxDouble3(0.8, 0.8, 0.8)};
+	FbxPropertyT<FbxDouble> DiffuseFactor{1.0};
+	FbxPropertyT<FbxDouble3> TransparentColor{FbxDouble3(0.0, 0.0, 0.0)};
+	FbxPropertyT<FbxDouble> TransparencyFactor{0.0};
+
+protected:
+	friend class FbxFile::VMaterialReader;
+	using FbxSurfaceMaterial::FbxSurfaceMaterial;
+};
+
+class FbxSurfacePhong : public FbxSurfaceLambert
+{
+public:
+	FbxPropertyT<FbxDouble3> Specular{FbxDouble3(0.2, 0.2, 0.2)};
+	FbxPropertyT<FbxDouble> SpecularFactor{1.0};
+	FbxPropertyT<FbxDouble> Shininess{20.0};
+	FbxPropertyT<FbxDouble3> Reflection{FbxDouble3(0.0, 0.0, 0.0)};
+	FbxPropertyT<FbxDouble> ReflectionFactor{1.0};
+
+private:
+	friend class FbxFile::VMaterialReader;
+	using FbxSurfaceLambert::FbxSurfaceLambert;
+};
+
+class FbxFileTexture : public FbxObject
+{
+public:
+	/// As the file has them, in UTF-8: either may be empty, and either kind of separator may stand in them.
+	const char* GetFileName() const { return m_FileName.c_str(); }
+	const char* GetRelativeFileName() const { return m_RelativeFileName.c_str(); }
+
+private:
+	friend class FbxFile::VMaterialReader;
+
+	FbxFileTexture(std::string i_Name, std::string i_FileName, std::string i_RelativeFileName)
+	    : FbxObject(std::move(i_Name)), m_FileName(std::move(i_FileName)),
+	      m_RelativeFileName(std::move(i_RelativeFileName))
+	{
+	}
+
+	std::string m_FileName;
+	std::string m_RelativeFileName;
+};
+
+} // namespace fbxsdk

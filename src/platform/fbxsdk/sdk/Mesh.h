@@ -1,0 +1,105 @@
+#pragma once
+
+#include "fbxsdk/sdk/Deformer.h"
+#include "fbxsdk/sdk/Layer.h"
+#include "fbxsdk/sdk/Node.h"
+#include "fbxsdk/sdk/Status.h"
+
+#include <map>
+
+namespace fbxsdk
+{
+
+/// Control points and layer elements. Arrays are decoded when they are asked for.
+class FbxGeometryBase : public FbxNodeAttribute
+{
+public:
+	int GetControlPointsCount() const;
+
+	/// Relative to the node, in file units. Zeros beyond the end.
+	FbxVector4 GetControlPointAt(int pIndex) const;
+
+	/// The elements of a kind in the order of the file; null if there are not so many.
+	FbxGeometryElementNormal* GetElementNormal(int pIndex = 0);
+	FbxGeometryElementUV* GetElementUV(int pIndex = 0, FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eUnknown);
+	FbxGeometryElementMaterial* GetElementMaterial(int pIndex = 0);
+	int GetElementMaterialCount() const;
+
+protected:
+	FbxGeometryBase(std::string i_Name, const FbxFile::VArraySource& i_rRecord)
+	    : FbxNodeAttribute(std::move(i_Name)), m_Record(i_rRecord)
+	{
+	}
+	virtual void Load() const = 0;
+
+	template <typename T>
+	using VElements = std::map<int, std::unique_ptr<T>>;
+
+	FbxFile::VArraySource m_Record;
+	/// Three for each point.
+	mutable std::vector<double> m_Points;
+	VElements<FbxGeometryElementNormal> m_Normals;
+
+private:
+	template <typename T>
+	T* Element(VElements<T>& io_rElements, const char* i_pRecord, const char* i_pDirect, const char* i_pIndex,
+	    int i_Place);
+
+	VElements<FbxGeometryElementUV> m_UVs;
+	VElements<FbxGeometryElementMaterial> m_Materials;
+};
+
+class FbxGeometry : public FbxGeometryBase
+{
+public:
+	/// Counted among those of the type; null if there are not so many. Only skins are kept of a file.
+	FbxDeformer* GetDeformer(int pIndex, FbxDeformer::EDeformerType pDeformerType, FbxStatus* pStatus = nullptr) const;
+
+protected:
+	friend class FbxFile::VSceneBuilder;
+	using FbxGeometryBase::FbxGeometryBase;
+
+	std::vector<FbxSkin*> m_Skins;
+};
+
+class FbxMesh : public FbxGeometry
+{
+public:
+	FbxNodeAttribute::EType GetAttributeType() const override { return FbxNodeAttribute::eMesh; }
+
+	int GetPolygonCount() const;
+
+	/// 0 for a polygon that names control points that do not exist.
+	int GetPolygonSize(int pPolygonIndex) const;
+
+	/// The place of the polygon's first vertex in GetPolygonVertices; -1 if there is no such polygon.
+	int GetPolygonVertexIndex(int pPolygonIndex) const;
+
+	/// The control points of all polygons, one behind the other. Those of polygons of size 0 may not exist.
+	int* GetPolygonVertices() const;
+	int GetPolygonVertexCount() const;
+
+	/// Replaces the first normal element by one normal for each control point: the mean of its polygons' normals by
+	/// area. Zero for points without polygons. False if nothing was done: there is one and it is not to be overwritten,
+	/// or normals of another mapping are asked for.
+	bool GenerateNormals(bool pOverwrite = false, bool pByCtrlPoint = false, bool pCW = false);
+
+private:
+	friend class FbxFile::VSceneBuilder;
+	friend class FbxNode;
+
+	using FbxGeometry::FbxGeometry;
+
+	/// False if control points or polygons are damaged.
+	bool IsSound() const;
+	void Load() const override;
+	void CutPolygons() const;
+
+	mutable bool m_bLoaded = false;
+	mutable bool m_bSound = false;
+	mutable std::vector<int> m_PolygonVertices;
+	mutable std::vector<int> m_PolygonStarts;
+	mutable std::vector<int> m_PolygonSizes;
+};
+
+} // namespace fbxsdk
