@@ -60,6 +60,77 @@ TEST_P(ReferenceFile, BonesAgree)
 	}
 }
 
+/// Triangles, and the bounds of all vertices in place: these are those of the control points where the texture
+/// coordinates leave every control point in use.
+TEST_P(ReferenceFile, PlacedMeshesAgree)
+{
+	const nlohmann::json meshes = Reference(GetParam())["placedMeshes"];
+	FBXReader reader;
+	ASSERT_TRUE(reader.LoadFile(c_Folder + GetParam() + ".fbx"));
+	std::vector<VPlacedMesh> placed;
+	reader.ReadPlacedMeshes(placed);
+	ASSERT_EQ(placed.size(), meshes.size());
+	for (std::size_t i = 0; i < placed.size(); ++i)
+	{
+		const nlohmann::json& rExpected = meshes[i];
+		const VBasicMesh& rMesh = placed[i].m_Mesh;
+		EXPECT_EQ(placed[i].m_Name, rExpected["name"]);
+		EXPECT_EQ(rMesh.m_Parts.size(), std::max(rExpected["materials"].get<std::size_t>(), std::size_t(1)));
+		EXPECT_EQ(rMesh.m_Vertices.size(), rExpected["uvs"]);
+		std::size_t triangles = 0;
+		for (const VMeshPart& rPart : rMesh.m_Parts)
+			triangles += rPart.m_Indices.size() / (3 * rPart.m_IndexSize);
+		EXPECT_EQ(triangles, rExpected["triangles"]);
+		constexpr float inf = std::numeric_limits<float>::infinity();
+		float bounds[6]{inf, inf, inf, -inf, -inf, -inf};
+		for (const VBasicVertex& rVertex : rMesh.m_Vertices)
+		{
+			const auto& [x, y, z] = rVertex.m_Position;
+			const QVector3D point = placed[i].m_Transform.map(QVector3D(x, y, z));
+			for (int axis = 0; axis < 3; ++axis)
+			{
+				bounds[axis] = std::min(bounds[axis], point[axis]);
+				bounds[axis + 3] = std::max(bounds[axis + 3], point[axis]);
+			}
+		}
+		for (int k = 0; k < 6; ++k)
+		{
+			const double expected = rExpected["bounds"][k];
+			EXPECT_NEAR(bounds[k], expected, std::max(0.01, 1e-5 * std::abs(expected))) << placed[i].m_Name << ' ' << k;
+		}
+	}
+}
+
+TEST_P(ReferenceFile, SkinsAgree)
+{
+	const nlohmann::json reference = Reference(GetParam());
+	FBXReader reader;
+	ASSERT_TRUE(reader.LoadFile(c_Folder + GetParam() + ".fbx"));
+	VSkin skin;
+	reader.ReadSkin(skin);
+	EXPECT_EQ(skin.m_Meshes.size(), reference["skins"]);
+	if (skin.m_Meshes.empty())
+		return;
+	std::size_t bound = 0;
+	for (std::size_t i = 0; i < skin.m_pSkeleton->size(); ++i)
+	{
+		EXPECT_LT((*skin.m_pSkeleton)[i].m_ParentIndex, std::int64_t(i));
+		bound += (*skin.m_pSkeleton)[i].m_InverseBind.isIdentity() ? 0 : 1;
+	}
+	EXPECT_LE(bound, reference["clusters"]);
+	EXPECT_GE(bound + 1, reference["clusters"]) << "one bone at most is bound where the mesh is";
+	for (const VSkinMesh& rMesh : skin.m_Meshes)
+		for (const VSkinVertex& rVertex : rMesh.m_Vertices)
+		{
+			const auto& [a, b, c, d] = rVertex.m_BoneWeights;
+			EXPECT_GE(a + b + c + d, 252);
+			EXPECT_LE(a + b + c + d, 255);
+			EXPECT_TRUE(a >= b && b >= c && c >= d);
+			for (const std::uint8_t bone : rVertex.m_BoneIndices)
+				EXPECT_LT(bone, skin.m_pSkeleton->size());
+		}
+}
+
 INSTANTIATE_TEST_SUITE_P(Files, ReferenceFile,
     testing::Values("heaps_biped_zup_a7100", "kenney_medium_b7400", "own_game_zup_m_b7400", "own_ns_yup_cm_a7400",
         "own_ns_yup_cm_b7400", "pab_arnaud_b7500", "ufbx_max_transformed_skin_zup_b6100",

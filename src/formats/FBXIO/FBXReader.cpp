@@ -1,50 +1,15 @@
 #include "FBXIO/FBXReader.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "FBXIO/FBXMeshReader.h"
+#include "FBXIO/Matrices.h"
 #include "UtilsFileSystem/Paths.h"
 
 #include <boost/filesystem/operations.hpp>
 
-#include <fbxsdk.h>
-
-#include <cmath>
 #include <functional>
 #include <map>
 #include <vector>
-
-namespace
-{
-
-/// A matrix of the SDK is stored for row vectors.
-QMatrix4x4 SystemMatrix(const FbxAMatrix& i_rMatrix)
-{
-	QMatrix4x4 matrix;
-	for (int row = 0; row < 4; ++row)
-		for (int column = 0; column < 4; ++column)
-			matrix(row, column) = float(i_rMatrix.Get(column, row));
-	return matrix;
-}
-
-void CheckTransform(QMatrix4x4& io_rMatrix, const std::string& i_rName)
-{
-	// Asking for the entries this way makes Qt forget what special kind of matrix it takes this one for.
-	const float* const pEntries = io_rMatrix.data();
-	for (int i = 0; i < 16; ++i)
-		if (!std::isfinite(pEntries[i]))
-		{
-			NVX_LOG("FBXIO", NVX::ELogError, "Invalid transform for: %1%; setting to identity", i_rName);
-			io_rMatrix.setToIdentity();
-			return;
-		}
-}
-
-void ScaleTranslation(QMatrix4x4& io_rMatrix, float i_Scale)
-{
-	for (int row = 0; row < 3; ++row)
-		io_rMatrix(row, 3) *= i_Scale;
-}
-
-} // namespace
 
 class FBXIO::FBXReader::VImpl
 {
@@ -57,10 +22,14 @@ public:
 	/// While it runs, m_NodeScale is the product of the local X scalings down to the node.
 	void ForEachNode(FbxNode* i_pRoot, const std::function<bool(FbxNode*)>& i_rVisit);
 
+	/// Calls i_rVisit with each node that is a mesh; nothing if no file has been loaded.
+	void ForEachMesh(const std::function<void(FbxNode&)>& i_rVisit, bool i_bTopOnly = false);
+
 	float m_UnitScale = 1.0f;
 	float m_NodeScale = 1.0f;
 	int m_UpAxis = 0;
 	bool m_bComplete = false;
+	FBXMeshReader m_MeshReader;
 	std::shared_ptr<VSkinSkeleton> m_pSkeleton;
 
 private:
@@ -69,6 +38,7 @@ private:
 	void ReadSettings();
 	bool ProcessSkeletonNode(FbxNode* i_pNode);
 
+	bool m_bLoaded = false;
 	/// The last bone of each name.
 	std::map<std::string, std::int64_t> m_BoneOfName;
 	FbxManager* m_pManager = nullptr;
@@ -95,6 +65,7 @@ bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 		return false;
 	}
 	NVX_LOG("FBXIO", NVX::ELogInformation, "Loading file %1%", i_rPath);
+	m_MeshReader.SetPath(i_rPath);
 	m_pManager = FbxManager::Create();
 	if (!m_pManager)
 		return false;
@@ -105,6 +76,8 @@ bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 	Import();
 	ReadSettings();
 	ForEachNode(m_pScene->GetRootNode(), [this](FbxNode* i_pNode) { return ProcessSkeletonNode(i_pNode); });
+	m_MeshReader.SetSkeleton(m_pSkeleton);
+	m_bLoaded = true;
 	return true;
 }
 
@@ -146,6 +119,7 @@ void FBXIO::FBXReader::VImpl::ReadSettings()
 {
 	const FbxSystemUnit unit = m_pScene->GetGlobalSettings().GetSystemUnit();
 	m_UnitScale = float(unit.GetMultiplier() * unit.GetScaleFactor() * 10.0);
+	m_MeshReader.SetUnitScale(m_UnitScale);
 	int sign = 1;
 	switch (m_pScene->GetGlobalSettings().GetAxisSystem().GetUpVector(sign))
 	{
@@ -183,6 +157,20 @@ void FBXIO::FBXReader::VImpl::ForEachNode(FbxNode* i_pRoot, const std::function<
 			open.pop_back();
 		}
 	}
+}
+
+void FBXIO::FBXReader::VImpl::ForEachMesh(const std::function<void(FbxNode&)>& i_rVisit, bool i_bTopOnly)
+{
+	if (!m_bLoaded)
+		return;
+	ForEachNode(m_pScene->GetRootNode(),
+	    [&](FbxNode* i_pNode)
+	    {
+		    const bool bMesh = FBXMeshReader::IsMesh(*i_pNode);
+		    if (bMesh)
+			    i_rVisit(*i_pNode);
+		    return bMesh && i_bTopOnly;
+	    });
 }
 
 bool FBXIO::FBXReader::VImpl::ProcessSkeletonNode(FbxNode* i_pNode)
@@ -248,4 +236,25 @@ float FBXIO::FBXReader::GetUnitScale() const
 std::shared_ptr<const FBXIO::VSkinSkeleton> FBXIO::FBXReader::GetSkeleton() const
 {
 	return m_pImpl->m_pSkeleton;
+}
+
+void FBXIO::FBXReader::ReadPlacedMeshes(std::vector<VPlacedMesh>& o_rMeshes)
+{
+	o_rMeshes.clear();
+	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadPlacedMesh(i_rNode, o_rMeshes); });
+}
+
+void FBXIO::FBXReader::ReadTopMesh(VBasicMesh& o_rMesh)
+{
+	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadMesh(i_rNode, o_rMesh); }, true);
+}
+
+void FBXIO::FBXReader::ReadSkin(VSkin& o_rSkin)
+{
+	if (!HasSkeleton())
+		return;
+	std::set<std::int64_t> bones;
+	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.FindUsedBones(i_rNode, bones); });
+	o_rSkin.m_pSkeleton = m_pImpl->m_MeshReader.PruneSkeleton(std::move(bones));
+	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadSkinMesh(i_rNode, o_rSkin.m_Meshes); });
 }

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "FBXIO/SkinSkeleton.h"
+#include "FBXIO/Mesh.h"
 
 #include <memory>
 #include <string>
@@ -34,6 +34,16 @@ public:
 
 	/// The full skeleton; empty pointer if the file has none.
 	std::shared_ptr<const VSkinSkeleton> GetSkeleton() const;
+
+	/// Every mesh of the scene with its place; none before LoadFile has given true.
+	void ReadPlacedMeshes(std::vector<VPlacedMesh>& o_rMeshes);
+
+	/// For a file with one model: the last mesh that has no mesh above it, without any transform of nodes.
+	void ReadTopMesh(VBasicMesh& o_rMesh);
+
+	/// The meshes that have a skin, and the bones that matter: those with weights, all above and all below them. Called
+	/// at most once. Does nothing without a skeleton; the reader's own skeleton stays as it is.
+	void ReadSkin(VSkin& o_rSkin);
 
 private:
 	class VImpl;

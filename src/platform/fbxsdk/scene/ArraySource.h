@@ -17,10 +17,7 @@ struct VArraySource
 	VElementIndex m_Element = c_NoElement;
 
 	/// The child record of that name.
-	VArraySource Child(std::string_view i_Name) const
-	{
-		return {m_pTree, m_pBudget, m_pTree->Find(m_Element, i_Name)};
-	}
+	VArraySource Child(std::string_view i_Name) const { return {m_pTree, m_pBudget, m_pTree->Find(m_Element, i_Name)}; }
 };
 
 /// All numbers of the array, straight into o_rNumbers; none if the file has no such array. T is double or std::int32_t.

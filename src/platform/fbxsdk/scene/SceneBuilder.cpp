@@ -248,12 +248,13 @@ void FbxFile::VSceneBuilder::ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::Fb
 	}
 }
 
-void FbxFile::VSceneBuilder::ConnectParts(
-    const VBuilt& i_rChild, const VBuilt& i_rParent, std::string_view i_Property)
+void FbxFile::VSceneBuilder::ConnectParts(const VBuilt& i_rChild, const VBuilt& i_rParent, std::string_view i_Property)
 {
 	using namespace fbxsdk;
-	const auto child = [&]<typename T>(T*) { return std::holds_alternative<T*>(i_rChild) ? std::get<T*>(i_rChild) : nullptr; };
-	const auto parent = [&]<typename T>(T*) { return std::holds_alternative<T*>(i_rParent) ? std::get<T*>(i_rParent) : nullptr; };
+	const auto child = [&]<typename T>(T*)
+	{ return std::holds_alternative<T*>(i_rChild) ? std::get<T*>(i_rChild) : nullptr; };
+	const auto parent = [&]<typename T>(T*)
+	{ return std::holds_alternative<T*>(i_rParent) ? std::get<T*>(i_rParent) : nullptr; };
 	constexpr FbxNode* c_pNode = nullptr;
 	constexpr FbxMesh* c_pMesh = nullptr;
 	constexpr FbxSkin* c_pSkin = nullptr;

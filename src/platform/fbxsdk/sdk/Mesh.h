@@ -21,7 +21,8 @@ public:
 
 	/// The elements of a kind in the order of the file; null if there are not so many.
 	FbxGeometryElementNormal* GetElementNormal(int pIndex = 0);
-	FbxGeometryElementUV* GetElementUV(int pIndex = 0, FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eUnknown);
+	FbxGeometryElementUV* GetElementUV(
+	    int pIndex = 0, FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eUnknown);
 	FbxGeometryElementMaterial* GetElementMaterial(int pIndex = 0);
 	int GetElementMaterialCount() const;
 
@@ -42,8 +43,8 @@ protected:
 
 private:
 	template <typename T>
-	T* Element(VElements<T>& io_rElements, const char* i_pRecord, const char* i_pDirect, const char* i_pIndex,
-	    int i_Place);
+	T* Element(
+	    VElements<T>& io_rElements, const char* i_pRecord, const char* i_pDirect, const char* i_pIndex, int i_Place);
 
 	VElements<FbxGeometryElementUV> m_UVs;
 	VElements<FbxGeometryElementMaterial> m_Materials;

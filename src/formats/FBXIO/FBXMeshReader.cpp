@@ -1,0 +1,331 @@
+#include "FBXIO/FBXMeshReader.h"
+
+#include "DebugServices/GlobalLog.h"
+#include "FBXIO/Matrices.h"
+#include "FBXIO/Polygons.h"
+#include "UtilsFileSystem/Paths.h"
+
+#include <boost/filesystem/operations.hpp>
+
+#include <algorithm>
+#include <cmath>
+#include <map>
+
+namespace
+{
+
+using namespace FBXIO;
+
+/// The number of polygon vertices from which indices need four bytes.
+constexpr std::size_t c_FirstLargeCount = 0x10000;
+
+struct VInfluence
+{
+	std::int64_t m_Bone = 0;
+	float m_Weight = 0.0f;
+};
+
+QVector4D ColourAndFactor(const FbxPropertyT<FbxDouble3>& i_rColour, const FbxPropertyT<FbxDouble>& i_rFactor)
+{
+	const FbxDouble3 colour = i_rColour.Get();
+	return {float(colour[0]), float(colour[1]), float(colour[2]), float(i_rFactor.Get())};
+}
+
+FbxSkin* FindSkin(FbxNode& i_rNode)
+{
+	FbxGeometry* const pGeometry = FBXMeshReader::IsMesh(i_rNode) ? i_rNode.GetGeometry() : nullptr;
+	return pGeometry ? FbxCast<FbxSkin>(pGeometry->GetDeformer(0, FbxDeformer::eSkin)) : nullptr;
+}
+
+/// Calls i_Visit for each cluster with a bone and control points.
+template <typename TVisit>
+void ForEachCluster(FbxSkin& i_rSkin, TVisit&& i_Visit)
+{
+	for (int i = 0; i < i_rSkin.GetClusterCount(); ++i)
+		if (FbxCluster* const pCluster = i_rSkin.GetCluster(i);
+		    pCluster && pCluster->GetLink() && pCluster->GetControlPointIndicesCount() > 0)
+			i_Visit(*pCluster);
+}
+
+/// Fractions are cut off: what is missing to 255 is lost.
+void Quantise(const VInfluence* i_pInfluences, std::size_t i_Count, double i_Sum, VSkinVertex& o_rVertex)
+{
+	int remaining = 255;
+	for (std::size_t i = 0; i < i_Count; ++i)
+	{
+		o_rVertex.m_BoneIndices[i] = std::uint8_t(i_pInfluences[i].m_Bone);
+		if (!(i_Sum > 0.0))
+			continue;
+		const int part = int(std::clamp(i_pInfluences[i].m_Weight * 255.0 / i_Sum, 0.0, double(remaining)));
+		o_rVertex.m_BoneWeights[i] = std::uint8_t(part);
+		remaining -= part;
+	}
+}
+
+bool Exists(const boost::filesystem::path& i_rPath)
+{
+	boost::system::error_code error;
+	return !i_rPath.empty() && exists(i_rPath, error) && !error;
+}
+
+} // namespace
+
+void FBXIO::FBXMeshReader::SetSkeleton(std::shared_ptr<VSkinSkeleton> i_pSkeleton)
+{
+	m_pSkeleton = std::move(i_pSkeleton);
+	m_BoneOfName.clear();
+	if (m_pSkeleton)
+		for (std::size_t i = 0; i < m_pSkeleton->size(); ++i)
+			m_BoneOfName.insert_or_assign((*m_pSkeleton)[i].m_Name, std::int64_t(i));
+}
+
+bool FBXIO::FBXMeshReader::IsMesh(FbxNode& i_rNode)
+{
+	for (int i = 0; i < i_rNode.GetNodeAttributeCount(); ++i)
+		if (i_rNode.GetNodeAttributeByIndex(i)->GetAttributeType() == FbxNodeAttribute::eMesh)
+			return true;
+	return false;
+}
+
+template <typename TVertex>
+void FBXIO::FBXMeshReader::Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& o_rMesh)
+{
+	const int count = io_rFrom.GetControlPointsCount();
+	FbxGeometryElementNormal* pNormals = io_rFrom.GetElementNormal(0);
+	if (!pNormals || pNormals->GetMappingMode() != FbxLayerElement::eByControlPoint
+	    || pNormals->GetDirectArray().GetCount() < count)
+	{
+		io_rFrom.GenerateNormals(true, true, false);
+		pNormals = io_rFrom.GetElementNormal(0);
+	}
+	o_rMesh.m_Parts.assign(std::max(i_rNode.GetMaterialCount(), 1), VMeshPart());
+	for (int i = 0; i < i_rNode.GetMaterialCount(); ++i)
+		ReadMaterial(i_rNode.GetMaterial(i), o_rMesh.m_Parts[i]);
+
+	o_rMesh.m_Vertices.assign(count, TVertex());
+	std::size_t broken = 0;
+	for (int i = 0; i < count; ++i)
+	{
+		const FbxVector4 point = io_rFrom.GetControlPointAt(i);
+		const FbxVector4 normal = pNormals->GetDirectArray().GetAt(i);
+		bool bSound = true;
+		for (int axis = 0; axis < 3; ++axis)
+		{
+			const float position = float(point[axis] * m_UnitScale);
+			bSound = bSound && std::isfinite(position);
+			o_rMesh.m_Vertices[i].m_Position[axis] = std::isfinite(position) ? position : 0.0f;
+			o_rMesh.m_Vertices[i].m_Normal[axis] = float(normal[axis]);
+		}
+		broken += bSound ? 0 : 1;
+	}
+	if (broken > 0)
+		NVX_LOG("FBXIO", NVX::ELogWarning,
+		    "%1% control points of mesh %2% have coordinates that are no numbers; setting these to zero", broken,
+		    i_rNode.GetName());
+}
+
+template <typename TVertex>
+void FBXIO::FBXMeshReader::Finish(FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const
+{
+	const int* const pVertices = io_rFrom.GetPolygonVertices();
+	std::vector<std::uint32_t> indices(pVertices, pVertices + io_rFrom.GetPolygonVertexCount());
+	ApplyTexCoords(io_rFrom, io_rMesh.m_Vertices, indices);
+	if (io_rMesh.m_Vertices.size() < c_FirstLargeCount)
+		SplitIntoParts<std::uint16_t>(io_rFrom, indices, io_rMesh.m_Parts);
+	else
+		SplitIntoParts<std::uint32_t>(io_rFrom, indices, io_rMesh.m_Parts);
+}
+
+void FBXIO::FBXMeshReader::ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPart& io_rPart)
+{
+	if (const auto* const pPhong = FbxCast<FbxSurfacePhong>(i_pMaterial))
+	{
+		io_rPart.m_Specular = ColourAndFactor(pPhong->Specular, pPhong->SpecularFactor);
+		io_rPart.m_Shininess = float(pPhong->Shininess.Get());
+		io_rPart.m_Reflection = ColourAndFactor(pPhong->Reflection, pPhong->ReflectionFactor);
+	}
+	const auto* const pLambert = FbxCast<FbxSurfaceLambert>(i_pMaterial);
+	if (!pLambert)
+		return;
+	io_rPart.m_Emissive = ColourAndFactor(pLambert->Emissive, pLambert->EmissiveFactor);
+	io_rPart.m_Ambient = ColourAndFactor(pLambert->Ambient, pLambert->AmbientFactor);
+	io_rPart.m_Diffuse = ColourAndFactor(pLambert->Diffuse, pLambert->DiffuseFactor);
+	io_rPart.m_Transparent = ColourAndFactor(pLambert->TransparentColor, pLambert->TransparencyFactor);
+	if (pLambert->Diffuse.GetSrcObjectCount<FbxFileTexture>() > 0)
+		io_rPart.m_pTexture = m_Images.Get(FindTexture(*pLambert->Diffuse.GetSrcObject<FbxFileTexture>(0)));
+}
+
+std::string FBXIO::FBXMeshReader::FindTexture(const FbxFileTexture& i_rTexture) const
+{
+	// Files from Windows have its separators.
+	const auto path = [](std::string i_Text)
+	{
+		std::replace(i_Text.begin(), i_Text.end(), '\\', '/');
+		return UtilsFileSystem::PathFromUtf8(i_Text);
+	};
+	const boost::filesystem::path name = path(i_rTexture.GetFileName());
+	if (Exists(name))
+		return i_rTexture.GetFileName();
+	const boost::filesystem::path folder = UtilsFileSystem::PathFromUtf8(m_Path).parent_path();
+	const boost::filesystem::path relative = path(i_rTexture.GetRelativeFileName());
+	const bool bRelative = !relative.empty() && Exists(folder / relative);
+	return (folder / (bRelative ? relative : name.filename())).string();
+}
+
+bool FBXIO::FBXMeshReader::ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh)
+{
+	FbxMesh* const pMesh = i_rNode.GetMesh();
+	if (!pMesh)
+		return false;
+	Prepare(i_rNode, *pMesh, o_rMesh);
+	Finish(*pMesh, o_rMesh);
+	return true;
+}
+
+void FBXIO::FBXMeshReader::ReadPlacedMesh(FbxNode& i_rNode, std::vector<VPlacedMesh>& io_rMeshes)
+{
+	VPlacedMesh placed;
+	placed.m_Name = i_rNode.GetName();
+	placed.m_Transform = SystemMatrix(i_rNode.EvaluateGlobalTransform());
+	CheckTransform(placed.m_Transform, placed.m_Name);
+	ScaleTranslation(placed.m_Transform, m_UnitScale);
+	placed.m_Transform(3, 3) = 1.0f;
+	if (ReadMesh(i_rNode, placed.m_Mesh))
+		io_rMeshes.push_back(std::move(placed));
+}
+
+std::int64_t FBXIO::FBXMeshReader::FindBone(FbxCluster& i_rCluster) const
+{
+	if (const auto found = m_BoneOfName.find(i_rCluster.GetLink()->GetName()); found != m_BoneOfName.end())
+		return found->second;
+	NVX_LOG("FBXIO", NVX::ELogError, "Missing bone %1% for cluster %2%", i_rCluster.GetLink()->GetName(),
+	    i_rCluster.GetName());
+	return -1;
+}
+
+void FBXIO::FBXMeshReader::FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t>& io_rBones) const
+{
+	if (FbxSkin* const pSkin = FindSkin(i_rNode))
+		ForEachCluster(*pSkin,
+		    [&](FbxCluster& i_rCluster)
+		    {
+			    // The parents of a bone that is known are known too.
+			    for (std::int64_t bone = FindBone(i_rCluster); bone >= 0 && io_rBones.insert(bone).second;)
+				    bone = (*m_pSkeleton)[bone].m_ParentIndex;
+		    });
+}
+
+std::shared_ptr<const VSkinSkeleton> FBXIO::FBXMeshReader::PruneSkeleton(std::set<std::int64_t> i_Bones)
+{
+	const std::shared_ptr<VSkinSkeleton> pFull = m_pSkeleton;
+	for (std::size_t i = 0; i < pFull->size(); ++i)
+		if (i_Bones.contains((*pFull)[i].m_ParentIndex))
+			i_Bones.insert(std::int64_t(i));
+	const auto pPruned = std::make_shared<VSkinSkeleton>();
+	std::map<std::int64_t, std::int64_t> newIndex;
+	for (const std::int64_t bone : i_Bones)
+	{
+		newIndex[bone] = std::int64_t(pPruned->size());
+		pPruned->push_back((*pFull)[bone]);
+		if (std::int64_t& rParent = pPruned->back().m_ParentIndex; rParent >= 0)
+			rParent = newIndex.at(rParent);
+	}
+	SetSkeleton(pPruned);
+	return pPruned;
+}
+
+std::int64_t FBXIO::FBXMeshReader::BindBone(FbxCluster& i_rCluster)
+{
+	const std::int64_t bone = FindBone(i_rCluster);
+	if (bone < 0)
+		return 0;
+	FbxAMatrix transform;
+	FbxAMatrix link;
+	i_rCluster.GetTransformMatrix(transform);
+	i_rCluster.GetTransformLinkMatrix(link);
+	for (FbxAMatrix* const pMatrix : {&transform, &link})
+	{
+		FbxVector4 translation = pMatrix->GetT();
+		for (int axis = 0; axis < 3; ++axis)
+			translation[axis] *= m_UnitScale;
+		pMatrix->SetT(translation);
+	}
+	VSkinBone& rBone = (*m_pSkeleton)[bone];
+	rBone.m_InverseBind = SystemMatrix(link.Inverse() * transform);
+	CheckTransform(rBone.m_InverseBind, rBone.m_Name);
+	return bone;
+}
+
+void FBXIO::FBXMeshReader::ReadWeights(FbxNode& i_rNode, FbxSkin& i_rSkin, std::vector<VSkinVertex>& io_rVertices)
+{
+	std::vector<std::pair<FbxCluster*, std::int64_t>> clusters;
+	ForEachCluster(i_rSkin, [&](FbxCluster& i_rCluster) { clusters.emplace_back(&i_rCluster, BindBone(i_rCluster)); });
+	std::size_t broken = 0;
+	const auto forEachWeight = [&](const auto& i_rVisit)
+	{
+		broken = 0;
+		for (const auto& [pCluster, bone] : clusters)
+			for (int i = 0; i < pCluster->GetControlPointIndicesCount(); ++i)
+			{
+				const int point = pCluster->GetControlPointIndices()[i];
+				const float weight = float(pCluster->GetControlPointWeights()[i]);
+				if (point >= 0 && std::size_t(point) < io_rVertices.size() && std::isfinite(weight))
+					i_rVisit(std::size_t(point), VInfluence{bone, weight});
+				else
+					++broken;
+			}
+	};
+	// All lists in one: that of a point begins where the one before ends.
+	std::vector<std::size_t> ends(io_rVertices.size() + 1, 0);
+	forEachWeight([&ends](std::size_t i_Point, const VInfluence&) { ++ends[i_Point + 1]; });
+	for (std::size_t i = 1; i < ends.size(); ++i)
+		ends[i] += ends[i - 1];
+	std::vector<VInfluence> influences(ends.back());
+	forEachWeight(
+	    [&](std::size_t i_Point, const VInfluence& i_rInfluence) { influences[ends[i_Point]++] = i_rInfluence; });
+
+	std::size_t overFull = 0;
+	std::size_t unweighted = 0;
+	float largestDropped = 0.0f;
+	std::size_t begin = 0;
+	for (std::size_t point = 0; point < io_rVertices.size(); begin = ends[point++])
+	{
+		VInfluence* const pBegin = influences.data() + begin;
+		std::size_t count = ends[point] - begin;
+		std::sort(pBegin, pBegin + count,
+		    [](const VInfluence& i_rA, const VInfluence& i_rB)
+		    { return i_rA.m_Weight != i_rB.m_Weight ? i_rA.m_Weight > i_rB.m_Weight : i_rA.m_Bone < i_rB.m_Bone; });
+		if (count > 4)
+		{
+			++overFull;
+			largestDropped = std::max(largestDropped, pBegin[4].m_Weight);
+			count = 4;
+		}
+		double sum = 0.0;
+		for (std::size_t i = 0; i < count; ++i)
+			sum += pBegin[i].m_Weight;
+		unweighted += sum > 0.0 ? 0 : 1;
+		Quantise(pBegin, count, sum, io_rVertices[point]);
+	}
+	if (broken > 0)
+		NVX_LOG("FBXIO", NVX::ELogWarning,
+		    "%1% weights of mesh %2% left out because they are no numbers or name control points that do not exist",
+		    broken, i_rNode.GetName());
+	if (overFull > 0)
+		NVX_LOG("FBXIO", NVX::ELogDetail, "Too many bones on %1% vertices, with maximum contribution of %2%%%",
+		    overFull, largestDropped * 100.0f);
+	if (unweighted > 0)
+		NVX_LOG("FBXIO", NVX::ELogWarning, "%1% unweighted vertices in mesh %2%", unweighted, i_rNode.GetName());
+}
+
+void FBXIO::FBXMeshReader::ReadSkinMesh(FbxNode& i_rNode, std::vector<VSkinMesh>& io_rMeshes)
+{
+	FbxSkin* const pSkin = FindSkin(i_rNode);
+	FbxMesh* const pMesh = pSkin && m_pSkeleton ? i_rNode.GetMesh() : nullptr;
+	if (!pMesh)
+		return;
+	VSkinMesh& rMesh = io_rMeshes.emplace_back();
+	Prepare(i_rNode, *pMesh, rMesh);
+	ReadWeights(i_rNode, *pSkin, rMesh.m_Vertices);
+	Finish(*pMesh, rMesh);
+}

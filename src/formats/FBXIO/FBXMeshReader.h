@@ -1,0 +1,64 @@
+#pragma once
+
+#include "FBXIO/ImageCache.h"
+#include "FBXIO/Mesh.h"
+
+#include <fbxsdk.h>
+
+#include <set>
+#include <unordered_map>
+
+namespace FBXIO
+{
+
+/// Turns the meshes of an imported scene into vertices and indices that are drawn as they stand. FBXReader owns it and
+/// walks the scene. Findings go to the log category "FBXIO".
+class FBXMeshReader
+{
+public:
+	/// The file whose folder textures are looked for in.
+	void SetPath(const std::string& i_rPath) { m_Path = i_rPath; }
+
+	/// File units to millimetres.
+	void SetUnitScale(float i_UnitScale) { m_UnitScale = i_UnitScale; }
+
+	/// The skeleton whose bones clusters are found in; the last bone of each name.
+	void SetSkeleton(std::shared_ptr<VSkinSkeleton> i_pSkeleton);
+
+	static bool IsMesh(FbxNode& i_rNode);
+
+	/// In the node's own space. False if the mesh is damaged.
+	bool ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh);
+
+	void ReadPlacedMesh(FbxNode& i_rNode, std::vector<VPlacedMesh>& io_rMeshes);
+
+	/// Adds the bones that the node's skin is bound to, with all their parents.
+	void FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t>& io_rBones) const;
+
+	/// Makes the skeleton of these bones and of all below them, and goes on with it.
+	std::shared_ptr<const VSkinSkeleton> PruneSkeleton(std::set<std::int64_t> i_Bones);
+
+	/// Adds the node's mesh if it has a skin. Fills the inverse bind matrices of the skeleton.
+	void ReadSkinMesh(FbxNode& i_rNode, std::vector<VSkinMesh>& io_rMeshes);
+
+private:
+	template <typename TVertex>
+	void Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& o_rMesh);
+	template <typename TVertex>
+	void Finish(FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const;
+	void ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPart& io_rPart);
+	std::string FindTexture(const FbxFileTexture& i_rTexture) const;
+	void ReadWeights(FbxNode& i_rNode, FbxSkin& i_rSkin, std::vector<VSkinVertex>& io_rVertices);
+	/// 0, and told, if the skeleton has no bone of the link's name.
+	std::int64_t BindBone(FbxCluster& i_rCluster);
+	/// -1, and told, if the skeleton has none.
+	std::int64_t FindBone(FbxCluster& i_rCluster) const;
+
+	ImageCache m_Images;
+	std::string m_Path;
+	std::shared_ptr<VSkinSkeleton> m_pSkeleton;
+	std::unordered_map<std::string, std::int64_t> m_BoneOfName;
+	float m_UnitScale = 1.0f;
+};
+
+} // namespace FBXIO

@@ -1,0 +1,20 @@
+#pragma once
+
+#include <QMatrix4x4>
+
+#include <fbxsdk.h>
+
+#include <string>
+
+namespace FBXIO
+{
+
+/// A matrix of the SDK, which is stored for row vectors.
+QMatrix4x4 SystemMatrix(const FbxAMatrix& i_rMatrix);
+
+/// Makes a matrix with entries that are no numbers the identity, and tells the name.
+void CheckTransform(QMatrix4x4& io_rMatrix, const std::string& i_rName);
+
+void ScaleTranslation(QMatrix4x4& io_rMatrix, float i_Scale);
+
+} // namespace FBXIO

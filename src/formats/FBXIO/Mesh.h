@@ -1,0 +1,79 @@
+#pragma once
+
+#include "FBXIO/SkinSkeleton.h"
+
+#include <QImage>
+#include <QMatrix4x4>
+#include <QVector4D>
+
+#include <array>
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace FBXIO
+{
+
+/// As it is uploaded: position in millimetres, normal, texture coordinate.
+struct VBasicVertex
+{
+	std::array<float, 3> m_Position{};
+	std::array<float, 3> m_Normal{};
+	std::array<float, 2> m_TexCoord{};
+};
+static_assert(sizeof(VBasicVertex) == 32);
+
+/// Weights are parts of 255. Their sum is at most 255, and less where fractions were cut off.
+struct VSkinVertex : VBasicVertex
+{
+	std::array<std::uint8_t, 4> m_BoneIndices{};
+	std::array<std::uint8_t, 4> m_BoneWeights{};
+};
+static_assert(sizeof(VSkinVertex) == 40);
+
+/// One material's share of a mesh. Colours have their factor in w.
+struct VMeshPart
+{
+	QVector4D m_Emissive;
+	QVector4D m_Ambient;
+	QVector4D m_Diffuse{1.0f, 0.8f, 0.8f, 1.0f};
+	QVector4D m_Specular;
+	float m_Shininess = 0.0f;
+	QVector4D m_Transparent;
+	QVector4D m_Reflection;
+	/// Empty if there is none.
+	std::shared_ptr<const QImage> m_pTexture;
+	/// Bytes of one index, 2 or 4.
+	std::uint32_t m_IndexSize = 2;
+	/// A list of triangles.
+	std::vector<std::uint8_t> m_Indices;
+};
+
+template <typename TVertex>
+struct VMesh
+{
+	std::vector<VMeshPart> m_Parts;
+	std::vector<TVertex> m_Vertices;
+};
+
+using VBasicMesh = VMesh<VBasicVertex>;
+using VSkinMesh = VMesh<VSkinVertex>;
+
+struct VPlacedMesh
+{
+	VBasicMesh m_Mesh;
+	/// Global transform for column vectors, translation in millimetres.
+	QMatrix4x4 m_Transform;
+	/// The node's.
+	std::string m_Name;
+};
+
+struct VSkin
+{
+	std::vector<VSkinMesh> m_Meshes;
+	/// The bones that matter; indices in vertices are places in it.
+	std::shared_ptr<const VSkinSkeleton> m_pSkeleton;
+};
+
+} // namespace FBXIO
