@@ -1,5 +1,6 @@
 #include "DebugServices/GlobalLog.h"
 #include "FBXIO/FBXReader.h"
+#include "FBXIO/Mesh.h"
 #include "fbxsdk/container/Arrays.h"
 #include "fbxsdk/container/FileKind.h"
 
@@ -8,6 +9,7 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <cstring>
 #include <string>
 
 namespace
@@ -35,7 +37,39 @@ void Require(bool i_bHolds)
 
 } // namespace
 
-/// The whole road from a file to its bones, and every array in it.
+namespace
+{
+
+template <typename TVertex>
+void RequireWhole(const FBXIO::VMesh<TVertex>& i_rMesh)
+{
+	for (const FBXIO::VMeshPart& rPart : i_rMesh.m_Parts)
+	{
+		Require(rPart.m_Indices.size() % (3 * rPart.m_IndexSize) == 0);
+		for (std::size_t at = 0; at < rPart.m_Indices.size(); at += rPart.m_IndexSize)
+		{
+			std::uint32_t index = 0;
+			std::memcpy(&index, rPart.m_Indices.data() + at, rPart.m_IndexSize);
+			Require(index < i_rMesh.m_Vertices.size());
+		}
+	}
+}
+
+void ReadMeshes(FBXIO::FBXReader& io_rReader)
+{
+	std::vector<FBXIO::VPlacedMesh> placed;
+	io_rReader.ReadPlacedMeshes(placed);
+	for (const FBXIO::VPlacedMesh& rMesh : placed)
+		RequireWhole(rMesh.m_Mesh);
+	FBXIO::VSkin skin;
+	io_rReader.ReadSkin(skin);
+	for (const FBXIO::VSkinMesh& rMesh : skin.m_Meshes)
+		RequireWhole(rMesh);
+}
+
+} // namespace
+
+/// The whole road from a file to its bones, meshes and skin, and every array in it.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i_Size)
 {
 	static const std::shared_ptr<void> s_pQuiet = NVX::GlobalLog::AddSink([](const auto&, int, const std::string&) {});
@@ -47,6 +81,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i
 	if (reader.HasSkeleton())
 		for (const FBXIO::VSkinBone& rBone : *reader.GetSkeleton())
 			Require(rBone.m_ParentIndex >= -1 && rBone.m_ParentIndex < &rBone - reader.GetSkeleton()->data());
+
+	if (bLoaded)
+		ReadMeshes(reader);
 
 	const std::string bytes(reinterpret_cast<const char*>(i_pData), i_Size);
 	FbxFile::VElementTree tree;
