@@ -15,14 +15,14 @@ inline constexpr std::size_t c_RecordDepth = 64;
 inline constexpr std::uint64_t c_FileBytes = std::uint64_t(2) << 30;
 
 /// The lists that are made of a file, whatever is in it, stay below 128 MB together: 28 bytes for a record, 24 for a
-/// connection, 112 for an object, 0.9 KiB for a node, 0.8 KiB at most for a part of nodes. Large scenes with animation have some hundred thousand records; a
-/// character has some hundred nodes, and some thousand objects when it moves.
+/// connection, 112 for an object, 0.9 KiB for a node, 0.8 KiB at most for a part of nodes. Large scenes with animation
+/// have some hundred thousand records; a character has some hundred nodes, and some thousand objects when it moves.
 inline constexpr std::size_t c_Records = 1'000'000;
 inline constexpr std::size_t c_Objects = 250'000;
 inline constexpr std::size_t c_Nodes = 60'000;
 
 /// Materials, textures, meshes, skins and clusters; a character has some hundred, a crowd some thousand.
-inline constexpr std::size_t c_Parts = 30'000;
+inline constexpr std::size_t c_Parts = 10'000;
 
 /// All arrays that are decoded from one file, as bytes of their final storage.
 inline constexpr std::uint64_t c_DecodedBytes = 256'000'000;
