@@ -62,7 +62,7 @@ public:
 
 	std::shared_ptr<TesselPluginInterface::IQuickEngine> GetQuickEngine() override { return {}; }
 	NVX::CountedPointer<TesselPluginInterface::IPanelManager> GetPanelManager() override { return m_pPanelManager; }
-	std::shared_ptr<TesselPluginInterface::IGraphicsContext> GetGraphicsContext() override { return {}; }
+	std::shared_ptr<CoreGraphics::VShaderLibrary> GetGraphicsContext() override { return {}; }
 	std::shared_ptr<OrlexGraphics::VSkinCache> GetSkinCache() override { return {}; }
 
 	VPanelManager& PanelManager() { return *m_pPanelManager; }

@@ -4,6 +4,11 @@
 
 #include <memory>
 
+namespace CoreGraphics
+{
+class VShaderLibrary;
+}
+
 namespace OrlexGraphics
 {
 class VSkinCache;
@@ -13,7 +18,6 @@ namespace TesselPluginInterface
 {
 
 class IQuickEngine;
-class IGraphicsContext;
 
 /// The host's services around its window, in slot order. Each call hands out a new owner.
 class IPluginGui
@@ -24,7 +28,8 @@ public:
 	/// The QML engine, with the developer's reload flag and signals.
 	virtual std::shared_ptr<IQuickEngine> GetQuickEngine() = 0;
 	virtual NVX::CountedPointer<IPanelManager> GetPanelManager() = 0;
-	virtual std::shared_ptr<IGraphicsContext> GetGraphicsContext() = 0;
+	/// The shaders that all panels share.
+	virtual std::shared_ptr<CoreGraphics::VShaderLibrary> GetGraphicsContext() = 0;
 	virtual std::shared_ptr<OrlexGraphics::VSkinCache> GetSkinCache() = 0;
 };
 
