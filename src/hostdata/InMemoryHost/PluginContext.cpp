@@ -7,7 +7,8 @@ namespace InMemoryHost
 
 VPluginContext::VPluginContext()
     : m_pDispatcher(std::make_shared<VDispatcher>()), m_pFolders(std::make_shared<VPreferenceFolders>()),
-      m_pItemFactory(new VItemFactory), m_pFrameFactory(new VFrameFactory)
+      m_pSelectionManager(std::make_shared<VSelectionManager>()), m_pItemFactory(new VItemFactory),
+      m_pFrameFactory(new VFrameFactory)
 {
 }
 

@@ -3,6 +3,7 @@
 #include "InMemoryHost/Dispatcher.h"
 #include "InMemoryHost/Flow.h"
 #include "InMemoryHost/PreferenceFolders.h"
+#include "InMemoryHost/Selection.h"
 #include "TesselPluginInterface/IPluginContext.h"
 #include "TesselPluginInterface/IPluginGui.h"
 
@@ -22,17 +23,22 @@ public:
 	std::shared_ptr<TesselPluginInterface::IDispatcher> GetDispatcher() override { return m_pDispatcher; }
 	NVX::CountedPointer<TesselPluginInterface::IItemFactory> GetItemFactory() override { return m_pItemFactory; }
 	NVX::CountedPointer<TesselPluginInterface::IFrameFactory> GetFrameFactory() override { return m_pFrameFactory; }
-	std::shared_ptr<TesselPluginInterface::ISelectionManager> GetSelectionManager() override { return {}; }
+	std::shared_ptr<TesselPluginInterface::ISelectionManager> GetSelectionManager() override
+	{
+		return m_pSelectionManager;
+	}
 	bool GetSceneFlag() override { return false; }
 
 	/// The same objects, as what they are.
 	VDispatcher& Dispatcher() { return *m_pDispatcher; }
 	VItemFactory& ItemFactory() { return *m_pItemFactory; }
 	VPreferenceFolders& Folders() { return *m_pFolders; }
+	VSelectionManager& SelectionManager() { return *m_pSelectionManager; }
 
 private:
 	const std::shared_ptr<VDispatcher> m_pDispatcher;
 	const std::shared_ptr<VPreferenceFolders> m_pFolders;
+	const std::shared_ptr<VSelectionManager> m_pSelectionManager;
 	const NVX::CountedPointer<VItemFactory> m_pItemFactory;
 	const NVX::CountedPointer<VFrameFactory> m_pFrameFactory;
 };

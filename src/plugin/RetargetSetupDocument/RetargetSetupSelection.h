@@ -1,0 +1,54 @@
+#pragma once
+
+#include "NVX/Shared.h"
+
+#include <QObject>
+
+#include <array>
+#include <cstdint>
+#include <memory>
+
+namespace TesselPluginInterface
+{
+class IDispatcher;
+class ISelectionManager;
+} // namespace TesselPluginInterface
+
+/// The host's selection as the panel needs it: the one source segment, target segment and target of the document's
+/// subjects that is selected, -1 for none and for several. Made by NVX::MakeShared; follows the selection through the
+/// dispatcher from then on. User interface thread only.
+class VRetargetSetupSelection : public QObject, public NVX::VShared
+{
+	Q_OBJECT
+	Q_PROPERTY(int selectedSourceSegment READ SelectedSourceSegment WRITE SetSelectedSourceSegment NOTIFY Changed)
+	Q_PROPERTY(int selectedTargetSegment READ SelectedTargetSegment WRITE SetSelectedTargetSegment NOTIFY Changed)
+	Q_PROPERTY(int selectedTarget READ SelectedTarget WRITE SetSelectedTarget NOTIFY Changed)
+
+public:
+	VRetargetSetupSelection(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
+	    std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager);
+
+	std::int32_t SelectedSourceSegment() const { return m_Selected[0]; }
+	std::int32_t SelectedTargetSegment() const { return m_Selected[1]; }
+	std::int32_t SelectedTarget() const { return m_Selected[2]; }
+
+	/// These change what this object tells, and not the host's selection; its next change overrides them.
+	void SetSelectedSourceSegment(std::int32_t i_Index) { Set(0, i_Index); }
+	void SetSelectedTargetSegment(std::int32_t i_Index) { Set(1, i_Index); }
+	void SetSelectedTarget(std::int32_t i_Index) { Set(2, i_Index); }
+
+signals:
+	void Changed();
+
+protected:
+	void OnShared() override;
+
+private:
+	void Update();
+	void Set(std::size_t i_Which, std::int32_t i_Index);
+
+	const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
+	const std::shared_ptr<TesselPluginInterface::ISelectionManager> m_pSelectionManager;
+	/// Source segment, target segment, target.
+	std::array<std::int32_t, 3> m_Selected{-1, -1, -1};
+};

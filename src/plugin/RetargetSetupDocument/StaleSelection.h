@@ -1,0 +1,18 @@
+#pragma once
+
+class VRetargetSetup;
+
+namespace TesselPluginInterface
+{
+class ISelectionManager;
+}
+
+namespace RetargetSetup
+{
+
+/// Takes out of selection and pre-selection what the document no longer has: its source segments, target segments and
+/// targets whose index lies beyond their list. Otherwise an item of an older subject would come to life with a later
+/// one. Items of other kinds and other subjects stay. To be called on each change of the document.
+void DropStaleItems(const VRetargetSetup& i_rDocument, TesselPluginInterface::ISelectionManager& io_rManager);
+
+} // namespace RetargetSetup
