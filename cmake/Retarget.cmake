@@ -41,10 +41,10 @@ function(retarget_install name folder)
 	install(DIRECTORY ${folder} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup FILES_MATCHING PATTERN "*.h")
 endfunction()
 
-# retarget_test(NAME SOURCES ... LIBRARIES ...): a GoogleTest program; RETARGET_TEST_DATA is the folder tests/data and
-# RETARGET_SOURCE the root of the tree.
+# retarget_test(NAME SOURCES ... LIBRARIES ... [DISPLAY]): a GoogleTest program; RETARGET_TEST_DATA is the folder
+# tests/data and RETARGET_SOURCE the root of the tree. With DISPLAY it runs on a screen of its own, drawn in software.
 function(retarget_test name)
-	cmake_parse_arguments(PARSE_ARGV 1 arg "" "" "SOURCES;LIBRARIES")
+	cmake_parse_arguments(PARSE_ARGV 1 arg "DISPLAY" "" "SOURCES;LIBRARIES")
 	add_executable(test_${name} ${arg_SOURCES} ${CMAKE_SOURCE_DIR}/tests/TestMain.cpp)
 	target_link_libraries(test_${name} PRIVATE ${arg_LIBRARIES} GTest::gtest)
 	target_compile_definitions(test_${name} PRIVATE RETARGET_TEST_DATA="${CMAKE_SOURCE_DIR}/tests/data"
@@ -52,7 +52,19 @@ function(retarget_test name)
 	# Tests are compiled more often than they run: what they test is optimised, they are less. At -O1 g++ takes
 	# members of a variant for uninitialised.
 	target_compile_options(test_${name} PRIVATE -O1 $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>)
-	add_test(NAME ${name} COMMAND test_${name})
+	if(NOT arg_DISPLAY)
+		add_test(NAME ${name} COMMAND test_${name})
+		return()
+	endif()
+	find_program(RETARGET_XVFB_RUN xvfb-run REQUIRED)
+	# Each test begins to look for a free display at a number of its own: two that look at once take the same one.
+	string(MD5 hash "${CMAKE_BINARY_DIR}/${name}")
+	string(SUBSTRING ${hash} 0 4 hash)
+	math(EXPR display "100 + 0x${hash} % 30000")
+	add_test(NAME ${name} COMMAND ${RETARGET_XVFB_RUN} -a -n ${display} -s "-screen 0 1920x1200x24"
+		$<TARGET_FILE:test_${name}>)
+	set_tests_properties(${name} PROPERTIES ENVIRONMENT
+		"QT_QPA_PLATFORM=xcb;LIBGL_ALWAYS_SOFTWARE=1;LSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/display.supp:print_suppressions=0")
 endfunction()
 
 # retarget_package(): the CMake package config of all that was installed, so that find_package(RetargetSetup) gives
