@@ -7,6 +7,10 @@ set(CMAKE_CXX_STANDARD 20)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)
 set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+set(RETARGET_LIBRARY_DESTINATION ${CMAKE_INSTALL_LIBDIR}/RetargetSetup)
+# Installed programs and the module find the shared library beside the static ones, wherever the tree is moved to.
+file(RELATIVE_PATH fromPrograms /${CMAKE_INSTALL_BINDIR} /${RETARGET_LIBRARY_DESTINATION})
+set(CMAKE_INSTALL_RPATH $ORIGIN $ORIGIN/${fromPrograms})
 # One form of code for the libraries, the module that is made of them, and the programs.
 add_compile_options(-fPIC -Wall -Wextra -Werror)
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_LESS 13)
@@ -37,7 +41,8 @@ endfunction()
 # retarget_install(NAME FOLDER): the library and the headers of a folder go into the installed package.
 function(retarget_install name folder)
 	target_include_directories(${name} PUBLIC $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup>)
-	install(TARGETS ${name} EXPORT RetargetSetup ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR}/RetargetSetup)
+	install(TARGETS ${name} EXPORT RetargetSetup ARCHIVE DESTINATION ${RETARGET_LIBRARY_DESTINATION}
+		LIBRARY DESTINATION ${RETARGET_LIBRARY_DESTINATION} RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
 	install(DIRECTORY ${folder} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup FILES_MATCHING PATTERN "*.h")
 endfunction()
 
