@@ -2,10 +2,13 @@
 #include "retarget/Elements.h"
 #include "retarget/Output.h"
 #include "retarget/SubjectFile.h"
+#include "retarget/TargetKinematics.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "ComputeSubjectFK/TargetFKInterfaces.h"
 #include "CoreOrlexTypesUtils/PoseVector.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/UnusedObservations.h"
 #include "DebugServices/GlobalLog.h"
 
 #include <algorithm>
@@ -17,7 +20,9 @@ namespace
 
 using ComputeSubject::VComputeSubjectFK;
 using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
+using CoreOrlexTypesUtils::VRenumbering;
 
 struct VFkSettings
 {
@@ -26,24 +31,22 @@ struct VFkSettings
 	std::string m_State;
 };
 
-/// Targets that fit no class are left out, and their markers with them.
-std::unique_ptr<VComputeSubjectFK> Kinematics(VSubject i_Subject, const std::string& i_rPath)
+/// Leaves out the targets without kinematics, which is told.
+void DropUnusable(const ComputeSubject::VSegmentTree& i_rTree, const VSubjectApplicationData& i_rApplicationData,
+    std::vector<VSubject::VTarget>& io_rTargets)
 {
-	std::unique_ptr<VComputeSubjectFK> pFK;
-	try
+	std::vector<bool> keep(io_rTargets.size(), true);
+	for (std::size_t i = 0; i < keep.size(); ++i)
 	{
-		pFK = std::make_unique<VComputeSubjectFK>(i_Subject);
+		keep[i] = TargetKinematics(io_rTargets[i], i_rTree) != nullptr;
+		if (keep[i])
+			continue;
+		const auto& rNamed = i_rApplicationData.m_Targets;
+		NVX_LOG(c_pCategory, NVX::ELogWarning,
+		    "Target #%1% \"%2%\" does not fit its type, or has one without kinematics: it is left out", i,
+		    i < rNamed.size() ? rNamed[i].m_Name : std::string());
 	}
-	catch (const ComputeSubject::VConstructionException&)
-	{
-		NVX_LOG(c_pCategory, NVX::ELogWarning, "A target does not fit its type: no markers are computed");
-		i_Subject.m_Targets.clear();
-		pFK = std::make_unique<VComputeSubjectFK>(i_Subject);
-	}
-	if (pFK->NumberOfSegments() != i_Subject.m_Segments.size())
-		throw VCommandError(
-		    EBadInput, "\"" + i_rPath + "\" has segments that make no tree, or more than one: they have no kinematics");
-	return pFK;
+	CoreOrlexTypesUtils::VRenumbering(keep).Close(io_rTargets);
 }
 
 std::vector<double> State(const VFkSettings& i_rSettings, const VSubjectParametrised& i_rSubject, std::size_t i_Size)
@@ -69,41 +72,54 @@ std::vector<double> State(const VFkSettings& i_rSettings, const VSubjectParametr
 	return CoreOrlexTypesUtils::PoseVector(i_rSubject, pStatistic);
 }
 
-VJson MarkersToJson(const VSubject& i_rSubject, const VComputeSubjectFK& i_rFK)
+/// One entry for each of a subject's markers, or rotation observations.
+/// @param i_rRenumbering to the indices of i_rValues, which holds only those that targets name.
+template <typename TNamed, typename TValue>
+VJson ObservationsToJson(const std::vector<TNamed>& i_rNamed, const VRenumbering& i_rRenumbering,
+    const std::vector<TValue>& i_rValues, const std::vector<bool>& i_rValid, const char* i_pKey,
+    const TValue& i_rWithout)
 {
-	std::vector<Rotation::VVector3> positions;
-	i_rFK.ComputeMarkers(positions);
-	std::vector<double> weights(i_rSubject.m_Markers.size());
-	for (const VSubject::VTarget& rTarget : i_rSubject.m_Targets)
-		for (const std::uint32_t marker : rTarget.m_MarkerIndices)
-			if (marker < weights.size() && i_rFK.NumberOfTargets() > 0)
-				weights[marker] += rTarget.m_Weight;
-	VJson markers = VJson::array();
-	for (std::size_t i = 0; i < weights.size(); ++i)
+	VJson list = VJson::array();
+	for (std::size_t i = 0; i < i_rNamed.size(); ++i)
 	{
-		const bool bValid = i < positions.size() && weights[i] > 0.0;
-		VJson marker = VJson::object();
-		marker["name"] = i_rSubject.m_Markers[i].m_Name;
-		marker["position"] = bValid ? positions[i] : Rotation::VVector3{};
-		marker["valid"] = bValid;
-		markers.push_back(std::move(marker));
+		std::uint32_t index = std::uint32_t(i);
+		i_rRenumbering.Renumber(index);
+		const bool bValid = index < i_rValues.size() && i_rValid[index];
+		VJson item = VJson::object();
+		item["name"] = i_rNamed[i].m_Name;
+		item[i_pKey] = bValid ? i_rValues[index] : i_rWithout;
+		item["valid"] = bValid;
+		list.push_back(std::move(item));
 	}
-	return markers;
+	return list;
 }
 
 EExitStatus ShowPoses(const VFkSettings& i_rSettings)
 {
-	const VSubjectParametrised parametrised = ReadSubjectFile(i_rSettings.m_File).m_Record.m_SubjectParametrised;
+	const CoreOrlexTypes::VSubjectRecord record = ReadSubjectFile(i_rSettings.m_File).m_Record;
+	const VSubjectParametrised& rParametrised = record.m_SubjectParametrised;
 	VSubject subject;
-	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(parametrised, subject);
-	const auto pFK = Kinematics(subject, i_rSettings.m_File);
-	const std::vector<double> state = State(i_rSettings, parametrised, pFK->NumberOfStates());
-	pFK->Update(state.data());
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(rParametrised, subject);
+	const ComputeSubject::VSegmentTree tree = SegmentKinematics(subject);
+	if (tree.size() != subject.m_Segments.size())
+		throw VCommandError(EBadInput,
+		    "\"" + i_rSettings.m_File + "\" has segments that make no tree, or more than one: they have no kinematics");
+	DropUnusable(tree, record.m_SubjectApplicationData, subject.m_Targets);
+	// Kinematics count the markers and observations that targets name, and take them as the first of their lists.
+	const VRenumbering markers = CoreOrlexTypesUtils::NamedMarkers(subject);
+	const VRenumbering rotations = CoreOrlexTypesUtils::NamedRotations(subject);
+	for (VSubject::VTarget& rTarget : subject.m_Targets)
+	{
+		markers.Renumber(rTarget.m_MarkerIndices);
+		rotations.Renumber(rTarget.m_RotationObservationIndices);
+	}
+	VComputeSubjectFK fk(subject);
+	fk.Update(State(i_rSettings, rParametrised, fk.NumberOfStates()).data());
 
 	VJson segments = VJson::array();
 	for (std::size_t i = 0; i < subject.m_Segments.size(); ++i)
 	{
-		const Rotation::VPose<double> pose = pFK->Segment(i).SegmentPose();
+		const Rotation::VPose<double> pose = fk.Segment(i).SegmentPose();
 		VJson segment = VJson::object();
 		segment["name"] = subject.m_Segments[i].m_Name;
 		segment["rotation"] = pose.R;
@@ -112,7 +128,14 @@ EExitStatus ShowPoses(const VFkSettings& i_rSettings)
 	}
 	VJson result = VJson::object();
 	result["segments"] = std::move(segments);
-	result["markers"] = MarkersToJson(subject, *pFK);
+	std::vector<bool> valid;
+	std::vector<Rotation::VVector3> positions;
+	fk.ComputeMarkers(positions, valid);
+	result["markers"] = ObservationsToJson(rParametrised.m_Markers, markers, positions, valid, "position", {});
+	std::vector<Rotation::VMatrix3> orientations;
+	fk.ComputeRotations(orientations, valid);
+	result["rotations"] = ObservationsToJson(
+	    rParametrised.m_Rotations, rotations, orientations, valid, "rotation", Rotation::c_Identity3);
 	PrintJson(result);
 	return EFine;
 }
@@ -122,9 +145,8 @@ EExitStatus ShowPoses(const VFkSettings& i_rSettings)
 VCommand AddFkCommand(CLI::App& io_rProgram)
 {
 	CLI::App* const pApp = AddCommand(io_rProgram, "fk",
-	    "Show where the segments and markers of a skeleton or retarget file stand in the world as JSON: rotations row "
-	    "by "
-	    "row, translations in millimetres",
+	    "Show where the segments, markers and rotation observations of a skeleton or retarget file stand in the "
+	    "world, as JSON: rotations row by row, translations in millimetres",
 	    {"fk hero.qrr", "fk performer.qrs --pose tpose", "fk arm.qrs --state 0,0,0,0,0,1000,0.5"});
 	const auto pSettings = std::make_shared<VFkSettings>();
 	pApp->add_option("FILE", pSettings->m_File, "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)")

@@ -5,6 +5,7 @@
 #include "retarget/Table.h"
 
 #include "CoreOrlexTypes/Fields.h"
+#include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
 
 #include <cstdlib>
@@ -32,15 +33,51 @@ struct VTargetLine
 	std::string m_Target;
 	double m_Weight = 0.0;
 	std::vector<std::string> m_State;
-	VResidual m_Residual;
+	VTargetResidual m_Residual;
 };
+
+double Degrees(double i_Radians)
+{
+	return i_Radians * 180.0 / std::numbers::pi;
+}
+
+std::string ResidualText(const VResidual& i_rResidual)
+{
+	if (i_rResidual.m_Distance)
+		return Fixed(*i_rResidual.m_Distance, 3) + " mm";
+	if (i_rResidual.m_Angle)
+		return Fixed(Degrees(*i_rResidual.m_Angle), 3) + " deg";
+	return "-";
+}
+
+VJson ResidualToJson(const VResidual& i_rResidual)
+{
+	if (i_rResidual.m_Distance)
+		return *i_rResidual.m_Distance;
+	return i_rResidual.m_Angle ? VJson(Degrees(*i_rResidual.m_Angle)) : VJson();
+}
+
+/// A solver goes by the targets' own kinematics, the editing tools store offsets from the segments' poses.
+void TellDisagreement(const std::vector<VTargetLine>& i_rLines)
+{
+	std::vector<VTargetResidual> residuals;
+	for (const VTargetLine& rLine : i_rLines)
+		residuals.push_back(rLine.m_Residual);
+	const std::optional<std::size_t> worst = WorstDisagreement(residuals);
+	if (worst)
+		NVX_LOG(c_pCategory, NVX::ELogWarning,
+		    "A solver sees targets elsewhere than their offsets say, at worst #%1% \"%2%\": %3% by the offset, %4% by "
+		    "the target's kinematics; post poses of segments and orientations of rotation targets do this",
+		    *worst, i_rLines[*worst].m_Name, ResidualText(residuals[*worst].m_Offset),
+		    ResidualText(residuals[*worst].m_Target));
+}
 
 std::vector<VTargetLine> Lines(VSession& io_rSession, bool i_bResiduals)
 {
 	const VRetargetSetup::VSubjectValues target = io_rSession.Document().TargetValues();
 	const auto& rSubject = *target.m_pParametrised;
 	std::vector<VTargetLine> lines(rSubject.m_Targets.size());
-	std::vector<VResidual> residuals(lines.size());
+	std::vector<VTargetResidual> residuals(lines.size());
 	if (i_bResiduals)
 		residuals = Residuals(io_rSession.Document().SourceValues(), target);
 	for (std::size_t i = 0; i < lines.size(); ++i)
@@ -50,8 +87,8 @@ std::vector<VTargetLine> Lines(VSession& io_rSession, bool i_bResiduals)
 		if (i < target.m_pApplicationData->m_Targets.size())
 			rLine.m_Name = target.m_pApplicationData->m_Targets[i].m_Name;
 		rLine.m_Type = CoreOrlexTypes::EnumeratorName(rTarget.m_Type);
-		if (const std::string* pName = RetargetSetup::SourceName(rSubject, rTarget))
-			rLine.m_Source = *pName;
+		for (const std::string& rName : FollowedNames(rSubject, rTarget))
+			rLine.m_Source += (rLine.m_Source.empty() ? "" : ", ") + rName;
 		if (const std::string* pName = RetargetSetup::TargetSegmentName(rSubject, rTarget))
 			rLine.m_Target = *pName;
 		rLine.m_Weight = rTarget.m_Weight;
@@ -59,11 +96,6 @@ std::vector<VTargetLine> Lines(VSession& io_rSession, bool i_bResiduals)
 		rLine.m_Residual = residuals[i];
 	}
 	return lines;
-}
-
-double Degrees(double i_Radians)
-{
-	return i_Radians * 180.0 / std::numbers::pi;
 }
 
 VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
@@ -81,21 +113,14 @@ VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
 		item["state"] = rLine.m_State;
 		if (i_bResiduals)
 		{
-			item["distance"] = rLine.m_Residual.m_Distance ? VJson(*rLine.m_Residual.m_Distance) : VJson();
-			item["angle"] = rLine.m_Residual.m_Angle ? VJson(Degrees(*rLine.m_Residual.m_Angle)) : VJson();
+			const VResidual& rOffset = rLine.m_Residual.m_Offset;
+			item["distance"] = ResidualToJson({rOffset.m_Distance, {}});
+			item["angle"] = ResidualToJson({{}, rOffset.m_Angle});
+			item["targetResidual"] = ResidualToJson(rLine.m_Residual.m_Target);
 		}
 		list.push_back(std::move(item));
 	}
 	return list;
-}
-
-std::string ResidualText(const VResidual& i_rResidual)
-{
-	if (i_rResidual.m_Distance)
-		return Fixed(*i_rResidual.m_Distance, 3) + " mm";
-	if (i_rResidual.m_Angle)
-		return Fixed(Degrees(*i_rResidual.m_Angle), 3) + " deg";
-	return "-";
 }
 
 std::string LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
@@ -116,7 +141,7 @@ std::string LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResid
 		std::vector<std::string> texts{
 		    std::to_string(i), rLine.m_Name, rLine.m_Type, rLine.m_Source, rLine.m_Target, Shortest(rLine.m_Weight)};
 		if (i_bResiduals)
-			texts.push_back(ResidualText(rLine.m_Residual));
+			texts.push_back(ResidualText(rLine.m_Residual.m_Offset));
 		std::string state;
 		for (const std::string& rExpression : rLine.m_State)
 			state += (state.empty() ? "" : " ") + rExpression;
@@ -135,6 +160,7 @@ EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)
 	if (bResiduals)
 		session.LoadSource(i_rSettings.m_Source);
 	const std::vector<VTargetLine> lines = Lines(session, bResiduals);
+	TellDisagreement(lines);
 	if (i_rSettings.m_bJson)
 		PrintJson(LinesToJson(lines, bResiduals));
 	else
@@ -155,7 +181,8 @@ VCommand AddTargetsCommand(CLI::App& io_rProgram)
 	pApp->add_option("FILE.qrr", pSettings->m_File, "The retarget subject, or a legacy one (.qrx)")->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton, for the residuals")
 	    ->option_text("FILE.qrs");
-	pApp->add_flag("--json", pSettings->m_bJson, "As JSON, distances in mm and angles in degrees");
+	pApp->add_flag("--json", pSettings->m_bJson,
+	    "As JSON, distances in mm and angles in degrees; targetResidual is what a solver sees");
 	return {pApp, [pSettings] { return ShowTargets(*pSettings); }};
 }
 

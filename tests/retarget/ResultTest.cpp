@@ -4,6 +4,7 @@
 
 #include <cmath>
 #include <fstream>
+#include <optional>
 
 namespace
 {
@@ -167,29 +168,133 @@ TEST(Fk, PosesOfAHandMadeArm)
 <JointTemplate BIND-POSE="0 0 1.5707963267948966 10 20 1000" PRE-ORIENTATION="0 0 0" PRE-POSITION="0 0 0"/></JointFree>
 <Segment NAME="arm"><JointHinge NAME="j1" AXIS="0 0 1" PRE-ORIENTATION="0 0 0" PRE-POSITION="100 0 0">
 <JointTemplate BIND-POSE="1.5707963267948966" PRE-ORIENTATION="0 0 0" PRE-POSITION="Arm 0 0"/></JointHinge></Segment>
-</Segment></Skeleton><MarkerSet><Markers><Marker NAME="tip"/><Marker NAME="loose"/></Markers></MarkerSet>
-<TargetSet><Targets><TargetLocalPointToWorldPoint MARKER="tip" SEGMENT="arm" POSITION="50 0 0" WEIGHT="1" HIDDEN="false">
-<TargetLocalPointToWorldPointTemplate/></TargetLocalPointToWorldPoint></Targets></TargetSet></KinematicModel>)");
-	const VJson bind = Result({"fk", "arm.qrs"}, folder);
+</Segment></Skeleton><MarkerSet><Markers><Marker NAME="loose"/><Marker NAME="flat"/><Marker NAME="tip"/></Markers>
+</MarkerSet><TargetSet><Targets>
+<TargetLocalPlaneToWorldPoint MARKER="flat" SEGMENT="arm" ORIGIN="0 0 0" NORMAL="0 0 1" WEIGHT="1" HIDDEN="false">
+<TargetLocalPlaneToWorldPointTemplate/></TargetLocalPlaneToWorldPoint>
+<TargetLocalPointToWorldPoint MARKER="tip" SEGMENT="arm" POSITION="50 0 0" WEIGHT="1" HIDDEN="false">
+<TargetLocalPointToWorldPointTemplate/></TargetLocalPointToWorldPoint>
+<TargetLocalDirectionToWorldDirection NAME="gaze" SEGMENT="arm" DIRECTION="0 0 1" WEIGHT="1" HIDDEN="false"
+DIRECTION-OBSERVATION="look"/>
+<TargetLocalRotationToWorldRotation SEGMENT="arm" ROTATION="0 0 1.5707963267948966" WEIGHT="1" HIDDEN="false"
+ROTATION-OBSERVATION="aim"/></Targets></TargetSet></KinematicModel>)");
+	const VRun run = RunRetarget({"fk", "arm.qrs"}, folder.Path());
+	EXPECT_EQ(run.m_Err,
+	    "warning retarget: Target #2 \"gaze\" does not fit its type, or has one without kinematics: it is left out\n");
+	const VJson bind = VJson::parse(run.m_Out);
 	ASSERT_EQ(bind.at("segments").size(), 2u);
 	EXPECT_EQ(bind["segments"][1].at("name"), "arm");
 	ExpectNear(bind["segments"][0].at("rotation"), {0, -1, 0, 1, 0, 0, 0, 0, 1}, 1e-12);
 	ExpectNear(bind["segments"][0].at("translation"), {10, 20, 1000}, 1e-12);
 	ExpectNear(bind["segments"][1]["rotation"], {-1, 0, 0, 0, -1, 0, 0, 0, 1}, 1e-12);
 	ExpectNear(bind["segments"][1]["translation"], {10, 120, 1000}, 1e-12);
-	ASSERT_EQ(bind.at("markers").size(), 2u);
-	EXPECT_EQ(bind["markers"][0].at("valid"), true);
-	ExpectNear(bind["markers"][0].at("position"), {-40, 120, 1000}, 1e-12);
-	EXPECT_EQ(bind["markers"][1].at("name"), "loose");
-	EXPECT_EQ(bind["markers"][1].at("valid"), false);
+	ASSERT_EQ(bind.at("markers").size(), 3u);
+	EXPECT_EQ(bind["markers"][0].at("name"), "loose");
+	EXPECT_EQ(bind["markers"][0].at("valid"), false);
+	EXPECT_EQ(bind["markers"][1].at("valid"), false) << "a plane is no place";
+	EXPECT_EQ(bind["markers"][2].at("valid"), true);
+	ExpectNear(bind["markers"][2].at("position"), {-40, 120, 1000}, 1e-12);
+	ASSERT_EQ(bind.at("rotations").size(), 2u);
+	EXPECT_EQ(bind["rotations"][0].at("name"), "look");
+	EXPECT_EQ(bind["rotations"][0].at("valid"), false);
+	EXPECT_EQ(bind["rotations"][0].at("rotation"), VJson({1.0, 0.0, 0.0, 0.0, 1.0, 0.0, 0.0, 0.0, 1.0}));
+	EXPECT_EQ(bind["rotations"][1].at("valid"), true);
+	ExpectNear(bind["rotations"][1].at("rotation"), {0, 1, 0, -1, 0, 0, 0, 0, 1}, 1e-12);
 
 	const VJson own = Result({"fk", "arm.qrs", "--state", "0,0,0,0,0,0,-1.5707963267948966"}, folder);
 	ExpectNear(own["segments"][1]["translation"], {100, 0, 0}, 1e-12);
-	ExpectNear(own["markers"][0]["position"], {100, -50, 0}, 1e-12);
+	ExpectNear(own["markers"][2]["position"], {100, -50, 0}, 1e-12);
 
 	const VRun rest = RunRetarget({"fk", "arm.qrs", "--pose", "tpose"}, folder.Path());
 	EXPECT_EQ(rest.m_Status, 0);
 	EXPECT_NE(rest.m_Err.find("\"arm.qrs\" holds no tpose pose: zeros take its place"), std::string::npos);
+}
+
+/// One target of each kind on two segments, of which the second is turned by 90 degrees about Z and holds its points
+/// 9 mm off. All distances are known without a computer.
+TEST(Targets, ResidualsOfEveryKind)
+{
+	const VScratchFolder folder;
+	const std::string joint = R"(PRE-ORIENTATION="0 0 0" PRE-POSITION="0 0 0")";
+	const std::string atRest = R"(<JointTemplate BIND-POSE="0 0 0 0 0 0" )" + joint + "/></JointFree>";
+	const auto at = [&](const std::string& i_rName, const std::string& i_rPosition)
+	{
+		return "<Segment NAME=\"" + i_rName + "\"><JointDummy NAME=\"j" + i_rName
+		    + R"(" PRE-ORIENTATION="0 0 0" PRE-POSITION=")" + i_rPosition
+		    + R"("><JointTemplate PRE-ORIENTATION="0 0 0" PRE-POSITION=")" + i_rPosition
+		    + "\"/></JointDummy></Segment>";
+	};
+	folder.Write("source.qrs",
+	    R"(<KinematicModel VERSION="3.5"><Skeleton><Segment NAME="base"><JointFree NAME="j" )" + joint + ">" + atRest
+	        + at("P", "30 40 100") + at("Q", "0 0 7") + at("R", "0 0 0")
+	        + "</Segment></Skeleton><MarkerSet><Markers/></MarkerSet><TargetSet><Targets/></TargetSet></"
+	          "KinematicModel>");
+	folder.Write("kinds.qrr",
+	    R"(<KinematicModel VERSION="3.5"><Skeleton><Segment NAME="root"><JointFree NAME="j0" )" + joint + ">" + atRest
+	        + R"(<Segment NAME="bent"><JointDummy NAME="j1" PRE-ORIENTATION="0 0 1.5707963267948966" PRE-POSITION="0 0 0">
+<JointTemplate PRE-ORIENTATION="0 0 1.5707963267948966" PRE-POSITION="0 0 0" INVERSE-POST-POSITION="0 0 -9"/>
+</JointDummy></Segment></Segment></Skeleton><MarkerSet><Markers><Marker NAME="P"/><Marker NAME="Q"/><Marker NAME="R"/>
+<Marker NAME="nowhere"/></Markers></MarkerSet><TargetSet><Targets>
+<TargetLocalPlaneToWorldPoint MARKER="P" SEGMENT="root" ORIGIN="0 0 60" NORMAL="0 0 2" WEIGHT="1" HIDDEN="false">
+<TargetLocalPlaneToWorldPointTemplate/></TargetLocalPlaneToWorldPoint>
+<TargetLocalLineToWorldPoint MARKER="P" SEGMENT="root" ORIGIN="0 0 1" DIRECTION="0 0 3" WEIGHT="1" HIDDEN="false">
+<TargetLocalLineToWorldPointTemplate/></TargetLocalLineToWorldPoint>
+<TargetRigidBody SEGMENT="root" POSITION="0 0 -5" ORIENTATION="0 0 0" HIDDEN="false">
+<RigidBodyMarker NAME="P" POSITION="30 40 105"/><RigidBodyMarker NAME="Q" POSITION="0 0 11"/>
+<RigidBodyMarker NAME="R" POSITION="0 3 5"/></TargetRigidBody>
+<TargetRigidBody SEGMENT="root" POSITION="0 0 0" ORIENTATION="0 0 0" HIDDEN="false">
+<RigidBodyMarker NAME="P" POSITION="30 40 100"/><RigidBodyMarker NAME="Q" POSITION="0 0 7"/>
+<RigidBodyMarker NAME="nowhere" POSITION="0 0 0"/></TargetRigidBody>
+<TargetLocalRotationToWorldRotation SEGMENT="root" ROTATION="0 0 0.5" WEIGHT="1" ROTATION-OBSERVATION="base"
+HIDDEN="false"/>
+<TargetLocalDirectionToWorldDirection SEGMENT="root" DIRECTION="0 0 1" WEIGHT="1" DIRECTION-OBSERVATION="base"
+HIDDEN="false"/>
+<TargetLocalRotationToWorldRotation NAME="axis" SEGMENT="bent" ROTATION="0 0 0" AXIS="0 1 0" WEIGHT="1"
+ROTATION-OBSERVATION="base" HIDDEN="false"/>
+<TargetLocalPointToWorldPoint NAME="post" MARKER="Q" SEGMENT="bent" POSITION="3 0 -2" WEIGHT="1" HIDDEN="false">
+<TargetLocalPointToWorldPointTemplate/></TargetLocalPointToWorldPoint>
+</Targets></TargetSet></KinematicModel>)");
+
+	const VRun run = RunRetarget({"targets", "kinds.qrr", "--source", "source.qrs", "--json"}, folder.Path());
+	EXPECT_EQ(run.m_Status, 0) << run.m_Err;
+	const VJson targets = VJson::parse(run.m_Out, nullptr, false);
+	ASSERT_EQ(targets.size(), 8u);
+	struct VRow
+	{
+		const char* m_pName;
+		std::optional<double> m_Distance;
+		std::optional<double> m_Angle;
+		std::optional<double> m_Target;
+	};
+	// The trace of a quarter turn about Z times the axes (-r, 0, r), (r, 0, r), (0, 1, 0) with r = 1 / sqrt 2 is r.
+	const double behindAxis = std::acos((std::sqrt(0.5) - 1.0) / 2.0) * 180.0 / M_PI;
+	std::size_t i = 0;
+	for (const VRow& rRow :
+	    {VRow{"plane", 40.0, {}, 40.0}, VRow{"line", 50.0, {}, 50.0}, VRow{"body: the worst marker", 3.0, {}, 3.0},
+	        VRow{"body with an unknown marker", {}, {}, {}}, VRow{"rotation", {}, 90.0 / M_PI, 90.0 / M_PI},
+	        VRow{"direction", {}, {}, {}}, VRow{"rotation with an axis", {}, 90.0, behindAxis},
+	        VRow{"point behind a post pose", 3.0, {}, std::hypot(3.0, 18.0)}})
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		const VJson& rTarget = targets[i++];
+		const auto expect = [&](const char* i_pKey, const std::optional<double>& i_rExpected)
+		{
+			ASSERT_EQ(rTarget.at(i_pKey).is_null(), !i_rExpected) << i_pKey << " " << rTarget.at(i_pKey);
+			if (i_rExpected)
+			{
+				EXPECT_NEAR(rTarget.at(i_pKey).get<double>(), *i_rExpected, 1e-9) << i_pKey;
+			}
+		};
+		expect("distance", rRow.m_Distance);
+		expect("angle", rRow.m_Angle);
+		expect("targetResidual", rRow.m_Target);
+	}
+	EXPECT_EQ(targets[2].at("source"), "P, Q, R");
+	EXPECT_NE(run.m_Err.find("warning retarget: A solver sees targets elsewhere than their offsets say, at worst #6 "
+	                         "\"axis\": 90.000 deg by the offset, 98.421 deg by the target's kinematics; post poses "
+	                         "of segments and orientations of rotation targets do this\n"),
+	    std::string::npos)
+	    << run.m_Err;
 }
 
 TEST(Convert, WritesAnyVersionAndTellsWhatItLoses)

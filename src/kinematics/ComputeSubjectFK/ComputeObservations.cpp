@@ -45,9 +45,20 @@ void ForEachMarker(const std::vector<std::shared_ptr<ITargetFK>>& i_rTargets, st
 	}
 }
 
+bool AllSet(const std::vector<bool>& i_rFlags)
+{
+	return std::find(i_rFlags.begin(), i_rFlags.end(), false) == i_rFlags.end();
+}
+
 } // namespace
 
 bool VComputeSubjectFK::ComputeMarkers(std::vector<VVector3>& io_rPositions) const
+{
+	std::vector<bool> valid;
+	return ComputeMarkers(io_rPositions, valid);
+}
+
+bool VComputeSubjectFK::ComputeMarkers(std::vector<VVector3>& io_rPositions, std::vector<bool>& o_rValid) const
 {
 	io_rPositions.assign(m_NumberOfMarkers, VVector3{});
 	std::vector<double> weights(m_NumberOfMarkers, 0.0);
@@ -62,13 +73,22 @@ bool VComputeSubjectFK::ComputeMarkers(std::vector<VVector3>& io_rPositions) con
 		    for (int i = 0; i < 3; ++i)
 			    io_rPositions[i_Index][i] += share * i_rPoint[i];
 	    });
-	return std::all_of(weights.begin(), weights.end(), [](double i_Weight) { return i_Weight > 0.0; });
+	o_rValid.resize(weights.size());
+	std::transform(weights.begin(), weights.end(), o_rValid.begin(), [](double i_Weight) { return i_Weight > 0.0; });
+	return AllSet(o_rValid);
 }
 
 bool VComputeSubjectFK::ComputeRotations(std::vector<Rotation::VMatrix3>& io_rRotations) const
 {
+	std::vector<bool> valid;
+	return ComputeRotations(io_rRotations, valid);
+}
+
+bool VComputeSubjectFK::ComputeRotations(
+    std::vector<Rotation::VMatrix3>& io_rRotations, std::vector<bool>& o_rValid) const
+{
 	io_rRotations.assign(m_NumberOfRotations, Rotation::c_Identity3);
-	std::vector<bool> set(m_NumberOfRotations, false);
+	o_rValid.assign(m_NumberOfRotations, false);
 	for (const auto& rTgt : m_Targets)
 	{
 		NVX_ASSERT(rTgt);
@@ -78,9 +98,9 @@ bool VComputeSubjectFK::ComputeRotations(std::vector<Rotation::VMatrix3>& io_rRo
 		if (index >= io_rRotations.size())
 			continue;
 		io_rRotations[index] = rTgt->FromLocalRotation()->WorldRotation();
-		set[index] = true;
+		o_rValid[index] = true;
 	}
-	return std::find(set.begin(), set.end(), false) == set.end();
+	return AllSet(o_rValid);
 }
 
 } // namespace ComputeSubject

@@ -74,4 +74,18 @@ const IComputeJointFK& VComputeSegmentFK::JointBase() const
 	return m_pJoint->ComputeJointFK();
 }
 
+VSegmentTree MakeSegmentTree(const CoreOrlexTypes::VSubject& i_rSubject)
+{
+	VSegmentTree tree;
+	tree.reserve(i_rSubject.m_Segments.size());
+	for (const CoreOrlexTypes::VSubject::VSegment& rSegment : i_rSubject.m_Segments)
+	{
+		if (!tree.empty() && rSegment.m_ParentSegmentIndex >= tree.size())
+			return {};
+		const IComputeSegmentFK* const pParent = tree.empty() ? nullptr : tree[rSegment.m_ParentSegmentIndex].get();
+		tree.push_back(std::make_shared<VComputeSegmentFK>(rSegment, pParent));
+	}
+	return tree;
+}
+
 } // namespace ComputeSubject

@@ -71,4 +71,9 @@ private:
 	const Rotation::VPose<double>* m_pParentWorld = nullptr;
 };
 
+/// The segments of a subject, in order. Empty if a parent does not stand before its children, or if there is a second
+/// root.
+/// Throws VConstructionException for a joint of a type that has no class.
+VSegmentTree MakeSegmentTree(const CoreOrlexTypes::VSubject& i_rSubject);
+
 } // namespace ComputeSubject

@@ -15,24 +15,11 @@ using Rotation::VVector3;
 
 VComputeSubjectFK::VComputeSubjectFK(const VSubject& i_rSubject)
 {
-	m_SegmentTree.reserve(i_rSubject.m_Segments.size());
-	for (const VSubject::VSegment& rSegment : i_rSubject.m_Segments)
-	{
-		const IComputeSegmentFK* pParent = nullptr;
-		if (!m_SegmentTree.empty())
-		{
-			if (rSegment.m_ParentSegmentIndex >= m_SegmentTree.size())
-			{
-				Clear();
-				return;
-			}
-			pParent = m_SegmentTree[rSegment.m_ParentSegmentIndex].get();
-		}
-		m_SegmentTree.push_back(std::make_shared<VComputeSegmentFK>(rSegment, pParent));
-		m_NumberOfStates += m_SegmentTree.back()->NumberOfStates();
-	}
+	m_SegmentTree = MakeSegmentTree(i_rSubject);
 	if (m_SegmentTree.empty())
 		return;
+	for (const auto& rpSegment : m_SegmentTree)
+		m_NumberOfStates += rpSegment->NumberOfStates();
 
 	std::set<std::uint32_t> markers;
 	std::set<std::uint32_t> rotations;
@@ -81,15 +68,6 @@ VComputeSubjectFK::VComputeSubjectFK(const VComputeSubjectFK& i_rOther)
 }
 
 VComputeSubjectFK::~VComputeSubjectFK() = default;
-
-void VComputeSubjectFK::Clear()
-{
-	m_SegmentTree.clear();
-	m_Targets.clear();
-	m_NumberOfStates = 0;
-	m_NumberOfMarkers = 0;
-	m_NumberOfRotations = 0;
-}
 
 std::size_t VComputeSubjectFK::NumberOfTargets() const
 {

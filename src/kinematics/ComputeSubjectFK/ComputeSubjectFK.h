@@ -62,16 +62,20 @@ public:
 	/// weight is left at the origin; the result tells whether there is none. Indices beyond the list are left out.
 	virtual bool ComputeMarkers(std::vector<Rotation::VVector3>& io_rPositions) const;
 
+	/// The same, and of each marker whether it has weight.
+	bool ComputeMarkers(std::vector<Rotation::VVector3>& io_rPositions, std::vector<bool>& o_rValid) const;
+
 	/// The world rotation of each rotation observation, row by row; where several targets name one, the last holds.
 	/// One without a target is the identity; the result tells whether there is none.
 	virtual bool ComputeRotations(std::vector<Rotation::VMatrix3>& io_rRotations) const;
+
+	/// The same, and of each observation whether it has a target.
+	bool ComputeRotations(std::vector<Rotation::VMatrix3>& io_rRotations, std::vector<bool>& o_rValid) const;
 
 	/// Wraps all angles of NumberOfStates() values into their principal range; the poses that they give stay.
 	virtual void NormaliseState(double* io_pState) const;
 
 private:
-	void Clear();
-
 	VSegmentTree m_SegmentTree;
 	std::vector<std::shared_ptr<ITargetFK>> m_Targets;
 	std::size_t m_NumberOfStates = 0;

@@ -1,6 +1,6 @@
 #include "CoreOrlexTypesUtils/UnusedObservations.h"
 
-#include "CoreOrlexTypesUtils/Renumbering.h"
+#include "CoreOrlexTypes/Subject.h"
 
 namespace CoreOrlexTypesUtils
 {
@@ -8,14 +8,16 @@ namespace CoreOrlexTypesUtils
 namespace
 {
 
+using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectParametrised;
 
 /// @param i_pIndices the member of the targets that names elements of the list.
-VRenumbering NamedOnly(const std::vector<VSubjectParametrised::VTarget>& i_rTargets,
-    std::vector<std::uint32_t> VSubjectParametrised::VTarget::*i_pIndices, std::size_t i_Count)
+template <typename TTarget>
+VRenumbering NamedOnly(
+    const std::vector<TTarget>& i_rTargets, std::vector<std::uint32_t> TTarget::*i_pIndices, std::size_t i_Count)
 {
 	std::vector<bool> keep(i_Count, false);
-	for (const auto& rTarget : i_rTargets)
+	for (const TTarget& rTarget : i_rTargets)
 		for (const std::uint32_t index : rTarget.*i_pIndices)
 			if (index < i_Count)
 				keep[index] = true;
@@ -24,19 +26,33 @@ VRenumbering NamedOnly(const std::vector<VSubjectParametrised::VTarget>& i_rTarg
 
 } // namespace
 
+template <typename TSubject>
+VRenumbering NamedMarkers(const TSubject& i_rSubject)
+{
+	return NamedOnly(i_rSubject.m_Targets, &TSubject::VTarget::m_MarkerIndices, i_rSubject.m_Markers.size());
+}
+
+template <typename TSubject>
+VRenumbering NamedRotations(const TSubject& i_rSubject)
+{
+	return NamedOnly(
+	    i_rSubject.m_Targets, &TSubject::VTarget::m_RotationObservationIndices, i_rSubject.m_Rotations.size());
+}
+
 void RemoveUnusedMarkers(
     VSubjectParametrised& io_rSubject, CoreOrlexTypes::VSubjectApplicationData& io_rApplicationData)
 {
-	DropMarkers(io_rSubject, io_rApplicationData,
-	    NamedOnly(
-	        io_rSubject.m_Targets, &VSubjectParametrised::VTarget::m_MarkerIndices, io_rSubject.m_Markers.size()));
+	DropMarkers(io_rSubject, io_rApplicationData, NamedMarkers(io_rSubject));
 }
 
 void RemoveUnusedRotations(VSubjectParametrised& io_rSubject)
 {
-	DropRotations(io_rSubject,
-	    NamedOnly(io_rSubject.m_Targets, &VSubjectParametrised::VTarget::m_RotationObservationIndices,
-	        io_rSubject.m_Rotations.size()));
+	DropRotations(io_rSubject, NamedRotations(io_rSubject));
 }
+
+template VRenumbering NamedMarkers(const VSubject&);
+template VRenumbering NamedMarkers(const VSubjectParametrised&);
+template VRenumbering NamedRotations(const VSubject&);
+template VRenumbering NamedRotations(const VSubjectParametrised&);
 
 } // namespace CoreOrlexTypesUtils
