@@ -83,6 +83,35 @@ TEST_F(RefusingHost, WithoutAnItemEverythingStaysAsItWas)
 	EXPECT_EQ(changes, 0);
 }
 
+TEST_F(RefusingHost, ACommandWithoutAnItemIsToldAsIgnored)
+{
+	VSubjectApplicationData data;
+	data.m_Segments.resize(1);
+	m_Document.SetSourceSubject(MakeSubject({{"a", -1}}), data);
+	m_Document.SetTargetSubject(MakeSubject({{"b", -1}}), data);
+	m_Document.AddTarget(0, 0, true, false);
+	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
+
+	m_pItems->m_Refused = "FlowSubjectForSolving";
+	std::string commands;
+	QObject::connect(&m_Document, &VRetargetSetup::commandIgnored,
+	    [&commands](const QString& i_rCommand, const QString& i_rReason)
+	    {
+		    commands += i_rCommand.toStdString() + " ";
+		    EXPECT_EQ(i_rReason, "The host took no item for the change, so everything stays as it was.");
+	    });
+	VLogRecorder quiet;
+	m_Document.AddTarget(0, 0, true, false);
+	m_Document.RemoveTarget(0);
+	m_Document.UpdateTargets();
+	m_Document.CreateAllJoints();
+	m_Document.RemoveUnnecessaryJoints();
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(
+	    commands, "AddTarget RemoveTarget UpdateTargets CreateAllJoints RemoveUnnecessaryJoints CreateTargetSubject ");
+	EXPECT_EQ(m_Document.TargetValues().m_pParametrised->m_Targets.size(), 1u);
+}
+
 TEST_F(RefusingHost, WithoutAFrameTheEditStands)
 {
 	m_pFrames->m_bRefuse = true;

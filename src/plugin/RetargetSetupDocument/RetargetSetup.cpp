@@ -5,6 +5,7 @@
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/GlobalScale.h"
 #include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/IgnoredCommands.h"
 
 using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectApplicationData;
@@ -118,17 +119,34 @@ void VRetargetSetup::SetSourceSubject(VSubjectParametrised i_Parametrised, VSubj
 	    std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)));
 }
 
-void VRetargetSetup::SetTargetSubject(VSubjectParametrised i_Parametrised, VSubjectApplicationData i_ApplicationData,
+bool VRetargetSetup::SetTargetSubject(VSubjectParametrised i_Parametrised, VSubjectApplicationData i_ApplicationData,
     CoreOrlexQRTIO::VSubjectQRTExtras i_Extras)
 {
-	if (Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
+	if (!Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
 	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData))))
-		m_TargetExtras = std::move(i_Extras);
+		return false;
+	m_TargetExtras = std::move(i_Extras);
+	return true;
 }
 
 void VRetargetSetup::SetTargetSubjectParametrised(VSubjectParametrised i_Parametrised)
 {
 	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)), nullptr);
+}
+
+void VRetargetSetup::Ignore(const char* i_pCommand, const QString& i_rReason)
+{
+	emit commandIgnored(i_pCommand, i_rReason);
+}
+
+bool VRetargetSetup::ReplaceTarget(const char* i_pCommand, VSubjectParametrised i_Parametrised,
+    std::shared_ptr<const VSubjectApplicationData> i_pApplicationData)
+{
+	const bool bReplaced = Replace(m_TargetItems,
+	    std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)), std::move(i_pApplicationData));
+	if (!bReplaced)
+		Ignore(i_pCommand, RetargetSetup::Ignored::c_HostRefused);
+	return bReplaced;
 }
 
 VRetargetSetup::VSubjectValues VRetargetSetup::ValuesOf(const VSubjectItems& i_rItems)

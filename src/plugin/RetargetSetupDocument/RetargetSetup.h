@@ -30,8 +30,9 @@ class VComputeSubjectFK;
 ///
 /// The subjects live in six flow items, which are replaced and never changed. Every change ends in a new frame with the
 /// items, fresh list models and one firing of the change signal. There is no undo. What an operation needs and does not
-/// find (a subject, an index) ends it with no change; what the operator ought to know goes to the log.
-/// All of it runs on the user interface thread.
+/// find (a subject, an index) ends it with no change. The commands that QML calls return nothing: one that changed
+/// nothing says why by commandIgnored, and what else the operator ought to know goes to the log. All of it runs on the
+/// user interface thread.
 class VRetargetSetup : public QObject
 {
 	Q_OBJECT
@@ -109,7 +110,8 @@ public:
 	    CoreOrlexTypes::VSubjectParametrised i_Parametrised, CoreOrlexTypes::VSubjectApplicationData i_ApplicationData);
 
 	/// @param i_Extras of the file that the subject comes from.
-	void SetTargetSubject(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
+	/// @return false, with no change, if the host made no item.
+	bool SetTargetSubject(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
 	    CoreOrlexTypes::VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras = {});
 
 	/// An edit that leaves the application data and the extras as they are.
@@ -152,6 +154,14 @@ public:
 signals:
 	void jointSymmetryChanged();
 
+	/// After LoadTargetSubjectURL has replaced the target subject, and never for a file that could not be loaded.
+	void targetSubjectLoaded(const QUrl& i_rFileURL);
+
+	/// A command has ended with no change.
+	/// @param i_rCommand the name of the invokable.
+	/// @param i_rReason a sentence for the operator: what was missing, or what failed.
+	void commandIgnored(const QString& i_rCommand, const QString& i_rReason);
+
 private:
 	struct VSubjectItems
 	{
@@ -159,6 +169,13 @@ private:
 		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pApplicationData;
 		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pParametrised;
 	};
+
+	/// Emits commandIgnored.
+	void Ignore(const char* i_pCommand, const QString& i_rReason);
+
+	/// Replaces the target subject at the end of a command, which is ignored if the host made no item.
+	bool ReplaceTarget(const char* i_pCommand, CoreOrlexTypes::VSubjectParametrised i_Parametrised,
+	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData);
 
 	/// The source subject at rest in its bind pose; null if it has none. Kept until the source subject is another one.
 	const ComputeSubject::VComputeSubjectFK* SourceKinematics();

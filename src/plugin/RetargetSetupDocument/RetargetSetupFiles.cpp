@@ -11,6 +11,7 @@
 #include "RetargetSetupDocument/FilePath.h"
 #include "RetargetSetupDocument/GlobalScale.h"
 #include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/IgnoredCommands.h"
 #include "RetargetSetupDocument/LegacyText.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/TargetConstruction.h"
@@ -25,6 +26,7 @@ using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
 using CoreOrlexTypes::VSubjectRecord;
 using RetargetSetup::c_LogCategory;
+namespace Ignored = RetargetSetup::Ignored;
 
 namespace
 {
@@ -124,8 +126,9 @@ bool VRetargetSetup::LoadTargetFBX(const boost::filesystem::path& i_rPath)
 
 void VRetargetSetup::CreateTargetSubject()
 {
+	constexpr const char* c_Command = "CreateTargetSubject";
 	if (!m_pFBXSkeleton)
-		return;
+		return Ignore(c_Command, Ignored::c_NoFBX);
 	VSubjectParametrised subject;
 	VSubjectApplicationData applicationData;
 	subject.m_Name = RetargetSetup::c_SubjectName;
@@ -139,7 +142,7 @@ void VRetargetSetup::CreateTargetSubject()
 	{
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The FBX skeleton has no bone %1% to begin with: nothing is made",
 		    m_TargetRootIndex);
-		return;
+		return Ignore(c_Command, Ignored::c_NoRootBone);
 	}
 	const FBXIO::VSkinBone& rRootBone = (*m_pFBXSkeleton)[m_TargetRootIndex];
 	if (!m_bTargetRootChosen)
@@ -159,7 +162,8 @@ void VRetargetSetup::CreateTargetSubject()
 	for (int row = 0; row < 3; ++row)
 		rJoint.m_BindPose[std::size_t(3 + row)] = double(world(row, 3));
 	rJoint.m_Mean = rJoint.m_BindPose;
-	SetTargetSubject(std::move(subject), std::move(applicationData));
+	if (!SetTargetSubject(std::move(subject), std::move(applicationData)))
+		Ignore(c_Command, Ignored::c_HostRefused);
 }
 
 bool VRetargetSetup::LoadSourceSubject(const boost::filesystem::path& i_rPath, const std::string& i_rSkinName)
@@ -223,14 +227,33 @@ std::uint32_t VRetargetSetup::SaveTargetSubject(const boost::filesystem::path& i
 
 void VRetargetSetup::LoadTargetSubjectURL(const QUrl& i_rFileURL)
 {
+	constexpr const char* c_Command = "LoadTargetSubjectURL";
 	const boost::filesystem::path path = RetargetSetup::PathFromUrl(i_rFileURL);
-	if (!path.empty())
-		LoadTargetSubject(path);
+	if (path.empty())
+		return Ignore(c_Command, QString(Ignored::c_NotLocal).arg(i_rFileURL.toDisplayString()));
+	switch (LoadTargetSubject(path))
+	{
+	case NVX::Status::c_Success: emit targetSubjectLoaded(i_rFileURL); break;
+	case NVX::Status::c_FileNotOpened:
+		Ignore(c_Command, QString(Ignored::c_NotOpened).arg(i_rFileURL.toLocalFile()));
+		break;
+	case NVX::Status::c_NewerFileVersion:
+		Ignore(c_Command, QString(Ignored::c_LaterVersion).arg(i_rFileURL.toLocalFile()));
+		break;
+	default: Ignore(c_Command, QString(Ignored::c_NotRead).arg(i_rFileURL.toLocalFile())); break;
+	}
 }
 
 void VRetargetSetup::SaveTargetSubjectURL(const QUrl& i_rFileURL)
 {
+	constexpr const char* c_Command = "SaveTargetSubjectURL";
 	const boost::filesystem::path path = RetargetSetup::PathFromUrl(i_rFileURL);
-	if (!path.empty())
-		SaveTargetSubject(path);
+	if (path.empty())
+		return Ignore(c_Command, QString(Ignored::c_NotLocal).arg(i_rFileURL.toDisplayString()));
+	switch (SaveTargetSubject(path))
+	{
+	case NVX::Status::c_Success: break;
+	case NVX::Status::c_NothingToActOn: Ignore(c_Command, Ignored::c_NoTarget); break;
+	default: Ignore(c_Command, QString(Ignored::c_NotSaved).arg(i_rFileURL.toLocalFile())); break;
+	}
 }

@@ -5,6 +5,7 @@
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/IgnoredCommands.h"
 #include "RetargetSetupDocument/Joints.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
@@ -17,15 +18,19 @@ using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
 using RetargetSetup::c_LogCategory;
+namespace Ignored = RetargetSetup::Ignored;
 
 namespace
 {
 
-/// Null without the values that a command on both subjects needs, and if they are no tree.
+bool IsWhole(const VRetargetSetup::VSubjectValues& i_rValues)
+{
+	return i_rValues.m_pParametrised && i_rValues.m_pApplicationData && i_rValues.m_pSubject;
+}
+
+/// The subject must be whole.
 std::unique_ptr<VComputeSubjectFK> TargetKinematics(const VRetargetSetup::VSubjectValues& i_rTarget)
 {
-	if (!i_rTarget.m_pParametrised || !i_rTarget.m_pApplicationData || !i_rTarget.m_pSubject)
-		return nullptr;
 	return RetargetSetup::KinematicsInBindPose(*i_rTarget.m_pParametrised, *i_rTarget.m_pSubject, "target");
 }
 
@@ -72,17 +77,25 @@ const VComputeSubjectFK* VRetargetSetup::SourceKinematics()
 
 void VRetargetSetup::AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry)
 {
+	constexpr const char* c_Command = "AddTarget";
 	const VSubjectValues source = SourceValues();
 	const VSubjectValues target = TargetValues();
 	const auto sourceIndex = std::uint32_t(i_SourceSegmentIndex);
 	const auto targetIndex = std::uint32_t(i_TargetSegmentIndex);
-	if (!source.m_pParametrised || sourceIndex >= source.m_pParametrised->m_Segments.size() || !target.m_pParametrised
-	    || targetIndex >= target.m_pParametrised->m_Segments.size())
-		return;
+	if (!source.m_pParametrised)
+		return Ignore(c_Command, Ignored::c_NoSource);
+	if (!IsWhole(target))
+		return Ignore(c_Command, Ignored::c_NoTarget);
+	if (sourceIndex >= source.m_pParametrised->m_Segments.size())
+		return Ignore(c_Command, Ignored::c_NoSourceSegment);
+	if (targetIndex >= target.m_pParametrised->m_Segments.size())
+		return Ignore(c_Command, Ignored::c_NoTargetSegment);
 	const VComputeSubjectFK* const pSourceFK = SourceKinematics();
+	if (!pSourceFK)
+		return Ignore(c_Command, Ignored::c_SourceNoTree);
 	const auto pTargetFK = TargetKinematics(target);
-	if (!pSourceFK || !pTargetFK)
-		return;
+	if (!pTargetFK)
+		return Ignore(c_Command, Ignored::c_TargetNoTree);
 
 	VSubjectParametrised subject = *target.m_pParametrised;
 	VSubjectApplicationData applicationData = *target.m_pApplicationData;
@@ -103,58 +116,68 @@ void VRetargetSetup::AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentInde
 		if (sourceMirror != -1 && targetMirror != -1)
 			addPair(std::size_t(sourceMirror), std::size_t(targetMirror));
 	}
-	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)),
-	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)));
+	ReplaceTarget(
+	    c_Command, std::move(subject), std::make_shared<const VSubjectApplicationData>(std::move(applicationData)));
 }
 
 void VRetargetSetup::RemoveTarget(int i_TargetIndex)
 {
+	constexpr const char* c_Command = "RemoveTarget";
 	VSubjectParametrised subject;
 	VSubjectApplicationData applicationData;
-	if (!GetTargetSubjectAndData(subject, applicationData) || std::uint32_t(i_TargetIndex) >= subject.m_Targets.size())
-		return;
+	if (!GetTargetSubjectAndData(subject, applicationData))
+		return Ignore(c_Command, Ignored::c_NoTarget);
+	if (std::uint32_t(i_TargetIndex) >= subject.m_Targets.size())
+		return Ignore(c_Command, Ignored::c_NoSelectedTarget);
 	RetargetSetup::RemoveTarget(subject, applicationData, std::uint32_t(i_TargetIndex));
-	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)),
-	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)));
+	ReplaceTarget(
+	    c_Command, std::move(subject), std::make_shared<const VSubjectApplicationData>(std::move(applicationData)));
 }
 
 void VRetargetSetup::UpdateTargets()
 {
+	constexpr const char* c_Command = "UpdateTargets";
 	const VSubjectValues source = SourceValues();
 	const VSubjectValues target = TargetValues();
+	if (!source.m_pParametrised)
+		return Ignore(c_Command, Ignored::c_NoSource);
+	if (!IsWhole(target))
+		return Ignore(c_Command, Ignored::c_NoTarget);
 	const VComputeSubjectFK* const pSourceFK = SourceKinematics();
+	if (!pSourceFK)
+		return Ignore(c_Command, Ignored::c_SourceNoTree);
 	const auto pTargetFK = TargetKinematics(target);
-	if (!pSourceFK || !pTargetFK)
-		return;
+	if (!pTargetFK)
+		return Ignore(c_Command, Ignored::c_TargetNoTree);
 	VSubjectParametrised subject = *target.m_pParametrised;
 	RetargetSetup::UpdateTargetStates(*pSourceFK, *pTargetFK, *source.m_pParametrised, subject);
-	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)), target.m_pApplicationData);
+	ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData);
 }
 
 void VRetargetSetup::CreateAllJoints()
 {
+	constexpr const char* c_Command = "CreateAllJoints";
 	const VSubjectValues target = TargetValues();
-	if (!target.m_pParametrised || !target.m_pApplicationData)
-		return;
+	if (!IsWhole(target))
+		return Ignore(c_Command, Ignored::c_NoTarget);
 	VSubjectParametrised subject = *target.m_pParametrised;
 	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
 	RetargetSetup::EnableAllJoints(subject, extras);
-	if (Replace(
-	        m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)), target.m_pApplicationData))
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData))
 		m_TargetExtras = std::move(extras);
 }
 
 void VRetargetSetup::RemoveUnnecessaryJoints()
 {
+	constexpr const char* c_Command = "RemoveUnnecessaryJoints";
 	const VSubjectValues target = TargetValues();
-	if (!target.m_pParametrised || !target.m_pApplicationData || !target.m_pSubject)
-		return;
+	if (!IsWhole(target))
+		return Ignore(c_Command, Ignored::c_NoTarget);
 	VSubjectParametrised subject = *target.m_pParametrised;
 	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
 	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
 	if (const auto pBefore = RetargetSetup::KinematicsInBindPose(*target.m_pParametrised, *target.m_pSubject, "target"))
 		TellChangedPose(*pBefore, subject);
-	if (Replace(
-	        m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(subject)), target.m_pApplicationData))
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData))
 		m_TargetExtras = std::move(extras);
 }

@@ -1,0 +1,25 @@
+#pragma once
+
+/// Why a command of the document ended without a change, as the operator is told.
+namespace RetargetSetup::Ignored
+{
+
+inline constexpr const char* c_NoFBX = "No skeleton has been read from an FBX file. Choose a target FBX first.";
+inline constexpr const char* c_NoRootBone = "The FBX skeleton has no such root bone. Choose a target root.";
+inline constexpr const char* c_NoSource = "There is no source subject. Choose a source skeleton first.";
+inline constexpr const char* c_NoTarget = "There is no target subject. Create one, or open a retarget subject file.";
+inline constexpr const char* c_NoSourceSegment = "No single segment of the source subject is selected.";
+inline constexpr const char* c_NoTargetSegment = "No single segment of the target subject is selected.";
+inline constexpr const char* c_NoSelectedTarget = "No single target is selected.";
+inline constexpr const char* c_SourceNoTree = "The segments of the source subject make no tree with joints.";
+inline constexpr const char* c_TargetNoTree = "The segments of the target subject make no tree with joints.";
+inline constexpr const char* c_HostRefused = "The host took no item for the change, so everything stays as it was.";
+/// The rest take the file or URL as %1.
+inline constexpr const char* c_NotLocal = "'%1' is no file on this computer.";
+inline constexpr const char* c_NotOpened = "'%1' cannot be opened. The target subject is still the one before.";
+inline constexpr const char* c_LaterVersion =
+    "'%1' was written by a later version, which this one cannot read. The target subject is still the one before.";
+inline constexpr const char* c_NotRead = "'%1' could not be loaded. The target subject is still the one before.";
+inline constexpr const char* c_NotSaved = "Nothing was saved: '%1' could not be written, and is as it was.";
+
+} // namespace RetargetSetup::Ignored

@@ -1,0 +1,165 @@
+// What the document tells of its commands: each that ends with no change says why, and a loaded file is told as loaded.
+
+#include "TestDocument.h"
+
+#include <boost/filesystem/fstream.hpp>
+
+namespace
+{
+
+using CoreOrlexTypes::VSubjectParametrised;
+
+class CommandIgnored : public VDocumentTest
+{
+protected:
+	CommandIgnored()
+	{
+		QObject::connect(&m_Document, &VRetargetSetup::commandIgnored,
+		    [this](const QString& i_rCommand, const QString& i_rReason)
+		    { m_Told += (i_rCommand + ": " + i_rReason).toStdString(); });
+		QObject::connect(&m_Document, &VRetargetSetup::targetSubjectLoaded,
+		    [this](const QUrl& i_rUrl) { m_Told += "loaded " + i_rUrl.toString().toStdString(); });
+	}
+
+	std::string Take() { return std::exchange(m_Told, {}); }
+	std::string File(const char* i_pName) const { return (m_Folder / i_pName).string(); }
+	QUrl Url(const char* i_pName) const { return QUrl::fromLocalFile(QString::fromStdString(File(i_pName))); }
+	void Write(const char* i_pName, const char* i_pText) const
+	{
+		boost::filesystem::ofstream(File(i_pName), std::ios::binary) << i_pText;
+	}
+
+	void BreakTree(VSubjectParametrised i_Subject, bool i_bSource)
+	{
+		i_Subject.m_Segments[1].m_ParentSegmentIndex = 3;
+		const auto data = *m_Document.TargetValues().m_pApplicationData;
+		i_bSource ? m_Document.SetSourceSubject(i_Subject, data) : void(m_Document.SetTargetSubject(i_Subject, data));
+	}
+
+private:
+	std::string m_Told;
+};
+
+constexpr const char* c_NoSource = "There is no source subject. Choose a source skeleton first.";
+constexpr const char* c_NoTarget = "There is no target subject. Create one, or open a retarget subject file.";
+
+TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
+{
+	const struct
+	{
+		const char* m_pSetUp;
+		std::function<void()> m_SetUp;
+		const char* m_pCommand;
+		std::function<void()> m_Command;
+		std::string m_Reason;
+	} rows[] = {
+	    {"nothing", [] {}, "CreateTargetSubject", [this] { m_Document.CreateTargetSubject(); },
+	        "No skeleton has been read from an FBX file. Choose a target FBX first."},
+	    {"nothing", [] {}, "AddTarget", [this] { m_Document.AddTarget(0, 0, true, true); }, c_NoSource},
+	    {"nothing", [] {}, "RemoveTarget", [this] { m_Document.RemoveTarget(0); }, c_NoTarget},
+	    {"nothing", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); }, c_NoSource},
+	    {"nothing", [] {}, "CreateAllJoints", [this] { m_Document.CreateAllJoints(); }, c_NoTarget},
+	    {"nothing", [] {}, "RemoveUnnecessaryJoints", [this] { m_Document.RemoveUnnecessaryJoints(); }, c_NoTarget},
+	    {"nothing", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(Url("a.qrr")); },
+	        c_NoTarget},
+	    {"an FBX, a root beyond it",
+	        [this]
+	        {
+		        ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
+		        m_Document.SetTargetRootIndex(1000);
+	        },
+	        "CreateTargetSubject", [this] { m_Document.CreateTargetSubject(); },
+	        "The FBX skeleton has no such root bone. Choose a target root."},
+	    {"a source",
+	        [this] {
+		        m_Document.SetSourceSubject(MakeSubject({{"a", -1}}), {});
+	        },
+	        "AddTarget", [this] { m_Document.AddTarget(0, 0, true, true); }, c_NoTarget},
+	    {"a source", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); }, c_NoTarget},
+	    {"both", [this] { SetSmallSubjects(); }, "AddTarget", [this] { m_Document.AddTarget(-1, 0, true, true); },
+	        "No single segment of the source subject is selected."},
+	    {"both", [] {}, "AddTarget", [this] { m_Document.AddTarget(0, 5, false, false); },
+	        "No single segment of the target subject is selected."},
+	    {"both", [] {}, "RemoveTarget", [this] { m_Document.RemoveTarget(-1); }, "No single target is selected."},
+	    {"both", [] {}, "LoadTargetSubjectURL", [this] { m_Document.LoadTargetSubjectURL(QUrl("http://a/b.qrr")); },
+	        "'http://a/b.qrr' is no file on this computer."},
+	    {"both", [] {}, "LoadTargetSubjectURL", [this] { m_Document.LoadTargetSubjectURL({}); },
+	        "'' is no file on this computer."},
+	    {"both", [] {}, "LoadTargetSubjectURL", [this] { m_Document.LoadTargetSubjectURL(Url("100%1.qrr")); },
+	        "'" + File("100%1.qrr") + "' could not be loaded. The target subject is still the one before."},
+	    {"both", [] {}, "LoadTargetSubjectURL", [this] { m_Document.LoadTargetSubjectURL(Url("none.qrx")); },
+	        "'" + File("none.qrx") + "' cannot be opened. The target subject is still the one before."},
+	    {"a later file", [this] { Write("newer.qrx", "[[1,0,2],\"\"]{}"); }, "LoadTargetSubjectURL",
+	        [this] { m_Document.LoadTargetSubjectURL(Url("newer.qrx")); },
+	        "'" + File("newer.qrx")
+	            + "' was written by a later version, which this one cannot read. The target subject is still the one "
+	              "before."},
+	    {"a damaged file", [this] { Write("bad.qrr", "<not a skeleton"); }, "LoadTargetSubjectURL",
+	        [this] { m_Document.LoadTargetSubjectURL(Url("bad.qrr")); },
+	        "'" + File("bad.qrr") + "' could not be loaded. The target subject is still the one before."},
+	    {"both", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(QUrl("ftp://a/b.qrr")); },
+	        "'ftp://a/b.qrr' is no file on this computer."},
+	    {"both", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(Url("no/such/a.qrr")); },
+	        "Nothing was saved: '" + File("no/such/a.qrr") + "' could not be written, and is as it was."},
+	    {"a broken target", [this] { BreakTree(*m_Document.TargetValues().m_pParametrised, false); }, "AddTarget",
+	        [this] { m_Document.AddTarget(1, 1, true, false); },
+	        "The segments of the target subject make no tree with joints."},
+	    {"a broken target", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); },
+	        "The segments of the target subject make no tree with joints."},
+	    {"a broken source", [this] { BreakTree(*m_Document.SourceValues().m_pParametrised, true); }, "AddTarget",
+	        [this] { m_Document.AddTarget(1, 1, true, false); },
+	        "The segments of the source subject make no tree with joints."},
+	    {"a broken source", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); },
+	        "The segments of the source subject make no tree with joints."},
+	};
+	for (const auto& rRow : rows)
+	{
+		SCOPED_TRACE(std::string(rRow.m_pSetUp) + ", " + rRow.m_pCommand);
+		rRow.m_SetUp();
+		const auto pBefore = m_Document.TargetValues().m_pParametrised;
+		m_Changes = 0;
+		Take();
+		rRow.m_Command();
+		EXPECT_EQ(Take(), rRow.m_pCommand + (": " + rRow.m_Reason));
+		EXPECT_EQ(m_Document.TargetValues().m_pParametrised, pBefore);
+		EXPECT_EQ(m_Changes, 0);
+	}
+}
+
+TEST_F(CommandIgnored, NotByCommandsThatDoTheirWork)
+{
+	SetSmallSubjects();
+	m_Document.AddTarget(1, 1, true, true);
+	m_Document.AddTarget(0, 0, false, true); // No partner for the mirrored target: the log's matter.
+	m_Document.UpdateTargets();
+	m_Document.RemoveTarget(0);
+	m_Document.RemoveUnnecessaryJoints();
+	m_Document.CreateAllJoints();
+	m_Document.SaveTargetSubjectURL(Url("a.qrr"));
+	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(Take(), "");
+	m_Document.LoadTargetSubject(m_Folder / "a.qrr");
+	EXPECT_EQ(Take(), "") << "not the operator's command";
+	m_Document.LoadTargetSubjectURL(Url("a.qrr"));
+	EXPECT_EQ(Take(), "loaded " + Url("a.qrr").toString().toStdString());
+}
+
+TEST_F(CommandIgnored, AFileIsToldAsLoadedAfterTheDocumentHasIt)
+{
+	SetSmallSubjects();
+	m_Document.SaveTargetSubject(m_Folder / "a.qrr");
+	m_Document.RemoveUnnecessaryJoints();
+	std::size_t dummies = 0;
+	QObject::connect(&m_Document, &VRetargetSetup::targetSubjectLoaded,
+	    [&]
+	    {
+		    for (const auto& rSegment : Target().m_Segments)
+			    dummies += rSegment.m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy;
+	    });
+	m_Document.LoadTargetSubjectURL(Url("a.qrr"));
+	EXPECT_EQ(dummies, 0u);
+	EXPECT_EQ(Take(), "loaded " + Url("a.qrr").toString().toStdString());
+}
+
+} // namespace
