@@ -1,6 +1,7 @@
 #pragma once
 
 #include "UtilsFileSystem/LockingProcesses.h"
+#include "UtilsFileSystem/Registry.h"
 
 #include <boost/filesystem/path.hpp>
 
@@ -16,6 +17,9 @@ namespace UtilsFileSystem::Platform
 {
 
 std::shared_ptr<IProcessTable> GetProcessTable();
+
+/// The registry's root of the local machine; null on a system without a registry.
+std::unique_ptr<IRegistryKey> OpenLocalMachine();
 
 /// The path in the form that the system's calls take at any length.
 boost::filesystem::path::string_type NativePath(const boost::filesystem::path& i_rPath);
