@@ -95,7 +95,9 @@ VSubject WithTargets(std::mt19937& io_rRandom)
 	VSubject subject = RandomSubject(io_rRandom, 20);
 	subject.m_Targets = {Target(VTarget::ELocalPointToWorldPoint, 3, {1, 2, 3}, 0),
 	    Target(VTarget::ERigidBody, 19, {1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12}, 0),
-	    Target(VTarget::ELocalRotationToWorldRotation, 7, {1, 2, 3}, 0)};
+	    Target(VTarget::ELocalRotationToWorldRotation, 7, {1, 2, 3}, 0),
+	    Target(VTarget::ELocalLineToWorldPoint, 11, {1, 2, 3, 4, 5, 6}, 0),
+	    Target(VTarget::ELocalPlaneToWorldPoint, 15, {1, 2, 3, 4, 5, 6}, 0)};
 	subject.m_Targets[1].m_MarkerIndices = {1, 2};
 	return subject;
 }
@@ -180,7 +182,7 @@ TEST(SubjectFK, BrokenSubjectsAreRefusedOrUsable)
 		for (std::uint32_t damage = 1 + below(3); damage > 0; --damage)
 		{
 			VSubject::VSegment& rSegment = subject.m_Segments[below(20)];
-			VTarget& rTarget = subject.m_Targets[below(3)];
+			VTarget& rTarget = subject.m_Targets[below(5)];
 			switch (below(9))
 			{
 			case 0: rSegment.m_ParentSegmentIndex = below(25); break;

@@ -192,6 +192,11 @@ TEST_F(RigidBody, ConversionTells)
 	EXPECT_EQ(m_Body.m_Targets[1].m_StateExpressions[2], "2*Arm");
 
 	const VSubjectParametrised points = m_Body;
+	ASSERT_TRUE(ToRigidBodyTarget(m_Body));
+	Target().m_ViewNormals.pop_back();
+	ASSERT_TRUE(ToPointTargets(m_Body));
+	EXPECT_EQ(m_Log.TakeTroubles(), VTexts{"ASSERT rTgt.m_ViewNormals.size()==1"});
+	EXPECT_EQ(m_Body.m_Targets.back().m_ViewNormals, (std::vector<std::array<double, 3>>(1)));
 	m_Body.m_Targets.resize(2);
 	EXPECT_FALSE(ToRigidBodyTarget(m_Body));
 	EXPECT_EQ(m_Log.TakeTroubles(),
@@ -329,6 +334,24 @@ TEST_F(RigidBody, AttachRefusesInOrderWithNothingChanged)
 	Target().m_SegmentIndices = {};
 	refuses({"2 A rigid body target must have a single parent segment!", invalid});
 	Target().m_SegmentIndices = {0};
+	const VSubjectParametrised good = m_Body;
+	const std::string freeRoot = "ASSERT rRigidBodySegment.m_Joint.m_JointType == TSubjectType::VJoint::EFree";
+	const std::string oneTarget = "ASSERT RigidBody.m_Targets.size() == 1";
+	const std::string bodyTarget = "ASSERT rRigidBodyTgt.m_Type == TSubjectType::VTarget::ERigidBody";
+	m_Body.m_Segments[0].m_Joint.m_JointType = VJoint::EBall;
+	refuses({"2 A rigid body must have a free joint as root!", freeRoot, invalid});
+	m_Body = good;
+	m_Body.m_Targets.push_back(Target());
+	const std::string targets = "2 In a rigid body there must be either one target of RigidBody type or several "
+	                            "targets parented to the root segment";
+	refuses({targets, oneTarget, invalid});
+	m_Body = good;
+	Target().m_Type = VTarget::ELocalPointToWorldPoint;
+	refuses({targets, bodyTarget, invalid});
+	m_Body.m_Segments.clear();
+	m_Body.m_Targets.clear();
+	refuses({"2 A rigid body must have at least 1 segment!", freeRoot, oneTarget, bodyTarget, invalid});
+	m_Body = good;
 	refuses({"2 RigidBodyAppData does not match RigidBody for cluster Prop"});
 	m_AppData.m_Markers.emplace_back();
 	refuses({"2 SubjectAppData does not match Subject for Performer"});

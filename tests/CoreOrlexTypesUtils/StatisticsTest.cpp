@@ -131,6 +131,16 @@ TEST(RestPose, GimbalLockKeepsTheMiddleAngle)
 	EXPECT_GT(Rotation::Determinant({C[0], C[1], C[2], C[3], C[4], C[5], C[6], C[7], C[8]}), 0.0);
 }
 
+/// Around 2^50 the numbers lie a quarter apart on one side and an eighth on the other.
+TEST(RestPose, AnAngleTooLargeForItsDeviationIsAsserted)
+{
+	VMessageLog log;
+	VNumbers mean;
+	VNumbers covariance;
+	RestPoseStiffnessToMeanCovariance(VJoint::EBall, {std::exp2(50), 0, 0}, {0, 100, 100}, mean, covariance);
+	EXPECT_EQ(log.TakeTroubles(), VTexts{"ASSERT AAMean.magnitude() < 1e-2"});
+}
+
 TEST(JointRange, OfOneAngleAndTwo)
 {
 	VNumbers centre;
@@ -202,16 +212,31 @@ TEST(JointStatistics, RefuseWhatDoesNotFit)
 		VNumbers Second;
 		VTexts Log;
 	} rows[] = {{MeanCovarianceToRestPoseStiffness, VJoint::EBall, {1}, {1},
-	                {"ASSERT Dof == i_rMeanPose.size()", "ASSERT ( Dof*Dof ) == i_rCovariance.size()"}},
+	                {"ASSERT Dof == i_rMeanPose.size()", "ASSERT ( Dof*Dof ) == i_rCovariance.size()",
+	                    "ASSERT i_rMean.size() == 3", "ASSERT i_rCovariance.size() == 9"}},
+	    {MeanCovarianceToRestPoseStiffness, VJoint::EFree, {1}, {1},
+	        {"ASSERT Dof == i_rMeanPose.size()", "ASSERT ( Dof*Dof ) == i_rCovariance.size()",
+	            "ASSERT i_rMean.size() == 6", "ASSERT i_rCovariance.size() == 36"}},
+	    {MeanCovarianceToRestPoseStiffness, VJoint::EHinge, {}, {},
+	        {"ASSERT Dof == i_rMeanPose.size()", "ASSERT ( Dof*Dof ) == i_rCovariance.size()"}},
 	    {MeanCovarianceToRestPoseStiffness, bad, {}, {}, {"2 Cannot convert statistics: unsupported joint type"}},
 	    {MeanCovarianceToRestPoseStiffness, VJoint::EHinge, {0}, {nan},
 	        {"2 Cannot convert statistics: a value is not finite"}},
 	    {RestPoseStiffnessToMeanCovariance, VJoint::EFree, {1}, {1},
+	        {"ASSERT i_rRestPose.size() == DoF", "ASSERT i_rStiffness.size() == DoF", "ASSERT i_rRestPose.size() == 6",
+	            "ASSERT i_rStiffness.size() == 6"}},
+	    {RestPoseStiffnessToMeanCovariance, VJoint::EBall, {0, 0, nan}, {1},
+	        {"ASSERT i_rStiffness.size() == DoF", "ASSERT i_rStiffness.size() == 3"}},
+	    {RestPoseStiffnessToMeanCovariance, VJoint::EBall, {0}, {1, 2, 3},
+	        {"ASSERT i_rRestPose.size() == DoF", "ASSERT i_rRestPose.size() == 3"}},
+	    {RestPoseStiffnessToMeanCovariance, VJoint::ESlider, {}, {},
 	        {"ASSERT i_rRestPose.size() == DoF", "ASSERT i_rStiffness.size() == DoF"}},
 	    {RestPoseStiffnessToMeanCovariance, VJoint::EJointType(77), {}, {},
 	        {"2 Cannot convert stats: unsupported joint type"}},
 	    {RangeToMinMax, VJoint::EHinge, {}, {1, 2},
 	        {"ASSERT DoF == i_rRangeCenteringState.size()", "ASSERT ( DoF*DoF ) == i_rRangeMatrix.size()"}},
+	    {RangeToMinMax, VJoint::EHardySpicer, {0, 0}, {1, 1},
+	        {"ASSERT ( DoF*DoF ) == i_rRangeMatrix.size()", "ASSERT i_rEllipseMat.size() == 4"}},
 	    {RangeToMinMax, bad, {}, {}, {"2 Cannot convert ranges: unsupported joint type"}},
 	    {RangeToMinMax, VJoint::EBall, {0, 0, nan}, VNumbers(9, 1.0),
 	        {"2 Cannot convert ranges: a value is not finite"}},

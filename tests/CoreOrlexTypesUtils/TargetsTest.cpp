@@ -47,7 +47,10 @@ TEST(MakeOneTargetPerMarker, OrdersByMarkerAndKeepsTheFirst)
 	EXPECT_EQ(log.Take(),
 	    (VTexts{"SubjectParametrisedUtils 3 Subject Kim target 0, labelers do not support non-point targets",
 	        "SubjectParametrisedUtils 3 Subject Kim marker 2, labelers do not support multiple targets per marker",
-	        "ASSERT rTgt.m_MarkerIndices.size() == 1"}));
+	        "ASSERT rTgt.m_MarkerIndices.size() == 1",
+	        "ASSERT MarkerIndexToOldTargetIndex.size() + MarkerLessTargetIndex.size() == io_rSubject.m_Targets.size()",
+	        "ASSERT io_rSubject.m_Targets.size() == NewTargets.size()",
+	        "ASSERT io_rAppData.m_Targets.size() == NewTargetData.size()"}));
 	ASSERT_EQ(subject.m_Targets.size(), 4u);
 	VTexts names;
 	for (const auto& rTarget : appData.m_Targets)
@@ -56,6 +59,14 @@ TEST(MakeOneTargetPerMarker, OrdersByMarkerAndKeepsTheFirst)
 	EXPECT_EQ(subject.m_Targets[0].m_MarkerIndices, VIndices{0});
 	EXPECT_EQ(subject.m_Targets[1].m_MarkerIndices, VIndices{2});
 	EXPECT_EQ(subject.m_Targets[3].m_MarkerIndices, (VIndices{1, 2}));
+
+	// In order already: a second run changes nothing.
+	const VSubjectParametrised before = subject;
+	MakeOneTargetPerMarker(subject, appData);
+	EXPECT_TRUE(subject == before);
+	EXPECT_EQ(log.TakeTroubles(),
+	    (VTexts{"3 Subject Kim target 2, labelers do not support non-point targets",
+	        "ASSERT rTgt.m_MarkerIndices.size() == 1"}));
 }
 
 TEST(CheckCalibration, TellsEveryKindOfFault)

@@ -1,6 +1,7 @@
 #include "numerics/FindTransformBetweenPointsRobust.h"
 
 #include "DebugServices/Assert.h"
+#include "DebugServices/GlobalLog.h"
 
 #include <gtest/gtest.h>
 
@@ -60,6 +61,28 @@ TEST(FindTransformBetweenPointsRobust, WrongPairsDoNotMatter)
 		for (std::size_t i = 0; i < rRow.m_Pairs; ++i)
 			EXPECT_LT(Distance(Apply(pose, points1[i]), Apply(c_Pose, points1[i])), rRow.m_Tolerance) << i;
 	}
+}
+
+TEST(FindTransformBetweenPointsRobust, TellsItsScore)
+{
+	NVX::VLogCategory& rCategory = NVX::GlobalLog::Category("System");
+	std::vector<std::string> told;
+	const auto pSink = NVX::GlobalLog::AddSink(
+	    [&](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rText)
+	    {
+		    if (&i_rCategory == &rCategory && i_Level == NVX::ELogDetail)
+			    told.push_back(i_rText);
+	    });
+	const int level = rCategory.Level();
+	rCategory.SetLevel(NVX::ELogDetail);
+	const std::vector<VVector3> triangle{{0, 0, 0}, {1, 0, 0}, {0, 1, 0}};
+	VPose<double> pose;
+	ASSERT_TRUE(FindTransformBetweenPointsRobust(triangle, triangle, pose));
+	rCategory.SetLevel(level);
+	const std::string words = "FindTransformBetweenPointsRobust Medsq ";
+	ASSERT_EQ(told.size(), 1u);
+	ASSERT_EQ(told[0].substr(0, words.size()), words);
+	EXPECT_LT(std::stod(told[0].substr(words.size())), 1e-25);
 }
 
 TEST(FindTransformBetweenPointsRobust, MirroredPointsStillGiveARotation)

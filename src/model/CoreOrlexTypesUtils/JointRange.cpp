@@ -152,7 +152,11 @@ bool RangeToMinMax(VJoint::EJointType i_JointType, const VNumbers& i_rRangeCente
 	const std::size_t DoF = CoreOrlexTypes::StateSize(i_JointType);
 	bool bFits = Expect(DoF == i_rRangeCenteringState.size(), "DoF == i_rRangeCenteringState.size()");
 	bFits &= Expect((DoF * DoF) == i_rRangeMatrix.size(), "( DoF*DoF ) == i_rRangeMatrix.size()");
-	if (!IsKnown(i_JointType) || !bFits || !AreFinite(i_rRangeCenteringState, i_rRangeMatrix))
+	if (!IsKnown(i_JointType))
+		return false;
+	const std::array<double, 2> ellipse =
+	    i_JointType == VJoint::EHardySpicer ? EllipseExtents(i_rRangeMatrix) : std::array<double, 2>{};
+	if (!bFits || !AreFinite(i_rRangeCenteringState, i_rRangeMatrix))
 		return false;
 
 	o_rMin.assign(DoF, 0.0);
@@ -164,7 +168,7 @@ bool RangeToMinMax(VJoint::EJointType i_JointType, const VNumbers& i_rRangeCente
 	else
 	{
 		const std::array<double, 2> extents = i_JointType == VJoint::EHardySpicer
-		    ? EllipseExtents(i_rRangeMatrix)
+		    ? ellipse
 		    : std::array<double, 2>{DoF ? std::sqrt(std::max(i_rRangeMatrix[0], 0.0)) : 0.0, 0.0};
 		for (std::size_t i = 0; i < DoF; ++i)
 		{

@@ -92,8 +92,11 @@ VMatrix3 RotationBlock(const VNumbers& i_rCovariance)
 template <std::size_t t_Size>
 bool ToRestPose(const VNumbers& i_rMean, const VNumbers& i_rCovariance, VNumbers& o_rRestPose, VNumbers& o_rStiffness)
 {
-	if (!ExpectSize(i_rMean, "i_rMean", t_Size) || !ExpectSize(i_rCovariance, "i_rCovariance", t_Size * t_Size)
-	    || !ExpectSize(o_rRestPose, "o_rRestPose", t_Size) || !ExpectSize(o_rStiffness, "o_rStiffness", t_Size))
+	bool bFits = ExpectSize(i_rMean, "i_rMean", t_Size);
+	bFits &= ExpectSize(i_rCovariance, "i_rCovariance", t_Size * t_Size);
+	bFits &= ExpectSize(o_rRestPose, "o_rRestPose", t_Size);
+	bFits &= ExpectSize(o_rStiffness, "o_rStiffness", t_Size);
+	if (!bFits)
 		return false;
 
 	VVector3 angles;
@@ -135,8 +138,11 @@ void KeepPositive(VNumbers& io_rCovariance)
 template <std::size_t t_Size, typename TEulerToAA>
 bool FromRestPose(const VNumbers& i_rRestPose, const VNumbers& i_rStiffness, VNumbers& o_rMean, VNumbers& o_rCovariance)
 {
-	if (!ExpectSize(i_rRestPose, "i_rRestPose", t_Size) || !ExpectSize(i_rStiffness, "i_rStiffness", t_Size)
-	    || !ExpectSize(o_rMean, "o_rMean", t_Size) || !ExpectSize(o_rCovariance, "o_rCovariance", t_Size * t_Size))
+	bool bFits = ExpectSize(i_rRestPose, "i_rRestPose", t_Size);
+	bFits &= ExpectSize(i_rStiffness, "i_rStiffness", t_Size);
+	bFits &= ExpectSize(o_rMean, "o_rMean", t_Size);
+	bFits &= ExpectSize(o_rCovariance, "o_rCovariance", t_Size * t_Size);
+	if (!bFits)
 		return false;
 
 	std::array<double, t_Size> restPose;
@@ -174,9 +180,7 @@ bool MeanCovarianceToRestPoseStiffness(VJoint::EJointType i_JointType, const VNu
 		NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert statistics: unsupported joint type");
 		return false;
 	}
-	if (!bFits)
-		return false;
-	if (!AllFinite(i_rMeanPose) || !AllFinite(i_rCovariance))
+	if (bFits && (!AllFinite(i_rMeanPose) || !AllFinite(i_rCovariance)))
 		return TellNotFinite();
 
 	o_rRestPose.assign(Dof, 0.0);
@@ -185,6 +189,8 @@ bool MeanCovarianceToRestPoseStiffness(VJoint::EJointType i_JointType, const VNu
 		return ToRestPose<6>(i_rMeanPose, i_rCovariance, o_rRestPose, o_rStiffness);
 	if (i_JointType == VJoint::EBall)
 		return ToRestPose<3>(i_rMeanPose, i_rCovariance, o_rRestPose, o_rStiffness);
+	if (!bFits)
+		return false;
 	o_rRestPose = i_rMeanPose;
 	for (std::size_t i = 0; i < Dof; ++i)
 		o_rStiffness[i] =
@@ -203,9 +209,7 @@ bool RestPoseStiffnessToMeanCovariance(VJoint::EJointType i_JointType, const VNu
 		NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert stats: unsupported joint type");
 		return false;
 	}
-	if (!bFits)
-		return false;
-	if (!AllFinite(i_rRestPose) || !AllFinite(i_rStiffness))
+	if (bFits && (!AllFinite(i_rRestPose) || !AllFinite(i_rStiffness)))
 		return TellNotFinite();
 
 	o_rMean.assign(DoF, 0.0);
@@ -214,6 +218,8 @@ bool RestPoseStiffnessToMeanCovariance(VJoint::EJointType i_JointType, const VNu
 		return FromRestPose<6, VEulerToAAFree>(i_rRestPose, i_rStiffness, o_rMean, o_rCovariance);
 	if (i_JointType == VJoint::EBall)
 		return FromRestPose<3, VEulerToAABall>(i_rRestPose, i_rStiffness, o_rMean, o_rCovariance);
+	if (!bFits)
+		return false;
 	o_rMean = i_rRestPose;
 	for (std::size_t i = 0; i < DoF; ++i)
 		o_rCovariance[i * (DoF + 1)] =

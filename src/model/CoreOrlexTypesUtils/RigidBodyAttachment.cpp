@@ -44,7 +44,8 @@ bool GoTogether(const TSubject& i_rSubject, const VSubjectApplicationData& i_rAp
 	    && i_rAppData.m_Targets.size() == i_rSubject.m_Targets.size();
 }
 
-/// Brings a rigid body into the layout of one target and evaluates it.
+/// Brings a rigid body into the layout of one target and evaluates it. False, with the assertions that do not hold and
+/// a message, if it is none.
 template <typename TSubject>
 bool PrepareBody(TSubject& io_rRigidBody, VSubjectApplicationData& io_rAppData, VSubject& o_rEvaluated)
 {
@@ -59,11 +60,18 @@ bool PrepareBody(TSubject& io_rRigidBody, VSubjectApplicationData& io_rAppData, 
 		return std::all_of(i_rTarget.m_MarkerIndices.begin(), i_rTarget.m_MarkerIndices.end(),
 		    [&](std::uint32_t i_Index) { return i_Index < io_rRigidBody.m_Markers.size(); });
 	};
-	const bool bGood = ValidateRigidBody(io_rRigidBody)
+	bool bGood = ValidateRigidBody(io_rRigidBody)
 	    && std::all_of(io_rRigidBody.m_Targets.begin(), io_rRigidBody.m_Targets.end(), inRange)
 	    && (io_rRigidBody.m_Targets.size() == 1 || ToRigidBodyTarget(io_rRigidBody, io_rAppData))
 	    && EvaluateSubject(io_rRigidBody, o_rEvaluated)
 	    && ReadRigidBody(o_rEvaluated.m_Targets.front(), pose, positions, poseCovariance, covariance);
+	bGood &= Expect(!io_rRigidBody.m_Segments.empty()
+	        && io_rRigidBody.m_Segments.front().m_Joint.m_JointType == VSubjectParametrised::VJoint::EFree,
+	    "rRigidBodySegment.m_Joint.m_JointType == TSubjectType::VJoint::EFree");
+	bGood &= Expect(io_rRigidBody.m_Targets.size() == 1, "RigidBody.m_Targets.size() == 1");
+	bGood &= Expect(
+	    !io_rRigidBody.m_Targets.empty() && io_rRigidBody.m_Targets.front().m_Type == TSubject::VTarget::ERigidBody,
+	    "rRigidBodyTgt.m_Type == TSubjectType::VTarget::ERigidBody");
 	return bGood || Refuse("Invalid inptut, subject %1% is not a rigid body!", name);
 }
 
@@ -234,11 +242,6 @@ bool AttachRigidBody(TSubject& io_rSubject, VSubjectApplicationData& io_rSubject
 	VSubject evaluated;
 	if (!PrepareBody(RigidBody, bodyAppData, evaluated))
 		return false;
-	Expect(RigidBody.m_Segments.front().m_Joint.m_JointType == VSubjectParametrised::VJoint::EFree,
-	    "rRigidBodySegment.m_Joint.m_JointType == TSubjectType::VJoint::EFree");
-	Expect(RigidBody.m_Targets.size() == 1, "RigidBody.m_Targets.size() == 1");
-	Expect(RigidBody.m_Targets.front().m_Type == TSubject::VTarget::ERigidBody,
-	    "rRigidBodyTgt.m_Type == TSubjectType::VTarget::ERigidBody");
 	if (!GoTogether(i_rRigidBody, i_rRigidBodyAppData))
 		return Refuse("RigidBodyAppData does not match RigidBody for cluster %1%", i_rRigidBody.m_Name);
 	if (!GoTogether(io_rSubject, io_rSubjectAppData))

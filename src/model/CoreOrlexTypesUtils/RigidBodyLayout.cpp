@@ -187,8 +187,11 @@ typename TSubject::VTarget MakePointTarget(
 	rTgt.m_MarkerIndices = {i_rBody.m_MarkerIndices[i_Marker]};
 	rTgt.m_SegmentIndices = {0};
 	rTgt.m_RotationObservationIndices.clear();
-	rTgt.m_ViewNormals = {i_Marker < i_rBody.m_ViewNormals.size() ? i_rBody.m_ViewNormals[i_Marker] : VVector3{}};
-	Expect(rTgt.m_ViewNormals.size() == 1, "rTgt.m_ViewNormals.size()==1");
+	rTgt.m_ViewNormals.clear();
+	if (i_Marker < i_rBody.m_ViewNormals.size())
+		rTgt.m_ViewNormals.push_back(i_rBody.m_ViewNormals[i_Marker]);
+	if (!Expect(rTgt.m_ViewNormals.size() == 1, "rTgt.m_ViewNormals.size()==1"))
+		rTgt.m_ViewNormals.emplace_back();
 	TurnNormals(i_rGeometry.m_FromSegment.R, rTgt.m_ViewNormals);
 	rTgt.m_Covariance.assign(i_rGeometry.m_Covariance[i_Marker].begin(), i_rGeometry.m_Covariance[i_Marker].end());
 	SplitTemplates(i_rGeometry.m_FromBody.R, i_Marker, i_rBody, rTgt);

@@ -35,7 +35,6 @@ void MakeOneTargetPerMarker(TSubject& io_rSubject, VSubjectApplicationData& io_r
 
 	std::map<std::uint32_t, std::size_t> MarkerIndexToOldTargetIndex;
 	std::vector<std::size_t> MarkerLessTargetIndex;
-	std::size_t dropped = 0;
 	for (std::size_t i = 0; i < io_rSubject.m_Targets.size(); ++i)
 	{
 		const auto& rTgt = io_rSubject.m_Targets[i];
@@ -48,14 +47,12 @@ void MakeOneTargetPerMarker(TSubject& io_rSubject, VSubjectApplicationData& io_r
 		else if (!Expect(rTgt.m_MarkerIndices.size() == 1, "rTgt.m_MarkerIndices.size() == 1"))
 			MarkerLessTargetIndex.push_back(i);
 		else if (!MarkerIndexToOldTargetIndex.emplace(rTgt.m_MarkerIndices.front(), i).second)
-		{
 			NVX_LOG(c_Category, NVX::ELogWarning,
 			    "Subject %1% marker %2%, labelers do not support multiple targets per marker", io_rSubject.m_Name,
 			    rTgt.m_MarkerIndices.front());
-			++dropped;
-		}
 	}
-	Expect(MarkerIndexToOldTargetIndex.size() + MarkerLessTargetIndex.size() + dropped == io_rSubject.m_Targets.size(),
+	// This and the two below hold where no marker has a second target, as labelling wants it.
+	Expect(MarkerIndexToOldTargetIndex.size() + MarkerLessTargetIndex.size() == io_rSubject.m_Targets.size(),
 	    "MarkerIndexToOldTargetIndex.size() + MarkerLessTargetIndex.size() == io_rSubject.m_Targets.size()");
 
 	std::vector<typename TSubject::VTarget> NewTargets;
@@ -72,10 +69,9 @@ void MakeOneTargetPerMarker(TSubject& io_rSubject, VSubjectApplicationData& io_r
 		take(oldIndex);
 	for (const std::size_t oldIndex : MarkerLessTargetIndex)
 		take(oldIndex);
-	Expect(io_rSubject.m_Targets.size() == NewTargets.size() + dropped,
-	    "io_rSubject.m_Targets.size() == NewTargets.size()");
-	Expect(io_rAppData.m_Targets.size() == NewTargetData.size() + dropped,
-	    "io_rAppData.m_Targets.size() == NewTargetData.size()");
+	Expect(io_rSubject.m_Targets.size() == NewTargets.size(), "io_rSubject.m_Targets.size() == NewTargets.size()");
+	Expect(
+	    io_rAppData.m_Targets.size() == NewTargetData.size(), "io_rAppData.m_Targets.size() == NewTargetData.size()");
 	io_rSubject.m_Targets = std::move(NewTargets);
 	io_rAppData.m_Targets = std::move(NewTargetData);
 }
