@@ -1,0 +1,405 @@
+import QtQuick 2.15
+import QtQuick.Controls 2.15
+import QtQuick.Dialogs 1.3
+import QtQuick.Layouts 1.15
+import Orlex.Controls 1.0
+import Orlex.Selection 1.0
+import Orlex.Tessel.Parameters 1.0
+import Orlex.Theme 1.0
+import TesselQML 1.0
+import TesselPluginRetargetSetup 1.0
+
+Rectangle {
+	id: retargetSetup
+
+	objectName: "retargetSetup"
+	color: Theme.window
+
+	property var subjectParametersModel: TesselParameters.ParameterGroupModel("RetargetSetup", "Subject")
+	property var targetParametersModel: TesselParameters.ParameterGroupModel("RetargetSetup", "Target")
+	property bool canAddTarget: RetargetSetupSelection.selectedSourceSegment !== -1
+		&& RetargetSetupSelection.selectedTargetSegment !== -1
+	// What "Save" writes: the file that was last loaded or saved.
+	property var currentTargetSubjectURL: null
+
+	// Below these something would be cut off.
+	readonly property real minimumWidth: columns.minimumWidth
+	readonly property real minimumHeight: leftColumn.implicitHeight + 2 * Theme.margin
+
+	Accessible.role: Accessible.Pane
+	Accessible.name: "Retarget Setup"
+
+	function addTarget(positionTarget) {
+		ContextRetargetSetup.AddTarget(RetargetSetupSelection.selectedSourceSegment,
+			RetargetSetupSelection.selectedTargetSegment, positionTarget, targetSymmetry.checked)
+	}
+
+	function isLegacy(url) {
+		return url.toString().endsWith(".qrx")
+	}
+
+	// Legacy files are only read: what came from one is saved under a new name.
+	function save() {
+		if (isLegacy(currentTargetSubjectURL))
+			saveDialog.open()
+		else
+			ContextRetargetSetup.SaveTargetSubjectURL(currentTargetSubjectURL)
+	}
+
+	Connections {
+		target: ContextRetargetSetup
+		// Of whatever asked for it; a file that could not be loaded is never what "Save" overwrites.
+		function onTargetSubjectLoaded(url) {
+			retargetSetup.currentTargetSubjectURL = url
+		}
+	}
+
+	Shortcut {
+		sequence: "Alt+T"
+		enabled: retargetSetup.canAddTarget
+		onActivated: retargetSetup.addTarget(true)
+	}
+	Shortcut {
+		sequence: "Alt+R"
+		enabled: retargetSetup.canAddTarget
+		onActivated: retargetSetup.addTarget(false)
+	}
+
+	FileDialog {
+		id: loadDialog
+		objectName: "loadDialog"
+		title: "Choose a file"
+		folder: ContextRetargetsUrl
+		nameFilters: ["Subject files (*.qrr)", "Legacy subject files (*.qrx)"]
+		onAccepted: {
+			if (fileUrls.length === 1)
+				ContextRetargetSetup.LoadTargetSubjectURL(fileUrls[0])
+		}
+	}
+	FileDialog {
+		id: saveDialog
+		objectName: "saveDialog"
+		title: "Choose a file"
+		folder: ContextRetargetsUrl
+		nameFilters: ["Subject files (*.qrr)"]
+		selectExisting: false
+		defaultSuffix: "qrr"
+		onAccepted: {
+			if (fileUrls.length !== 1)
+				return
+			const url = fileUrls[0]
+			ContextRetargetSetup.SaveTargetSubjectURL(url)
+			if (!retargetSetup.isLegacy(url))
+				retargetSetup.currentTargetSubjectURL = url
+		}
+	}
+
+	OrlexSplitView {
+		id: columns
+
+		readonly property real minimumWidth: leftColumn.minimumWidth + middle.SplitView.minimumWidth
+			+ right.SplitView.minimumWidth + 2 * 6
+
+		objectName: "columns"
+		anchors.fill: parent
+		orientation: Qt.Horizontal
+
+		Item {
+			id: left
+
+			SplitView.minimumWidth: leftColumn.minimumWidth
+			SplitView.preferredWidth: leftColumn.minimumWidth
+
+			ColumnLayout {
+				id: leftColumn
+
+				readonly property real minimumWidth: Math.ceil(Math.max(fileButtons.implicitWidth,
+					jointControls.implicitWidth, addControls.implicitWidth)) + 2 * Theme.margin
+				// The two boxes stand below each other.
+				readonly property real symmetryWidth: Math.max(jointSymmetry.implicitWidth, targetSymmetry.implicitWidth)
+
+				anchors.fill: parent
+				anchors.margins: Theme.margin
+				spacing: Theme.spacing
+
+				ParameterView {
+					objectName: "subjectParameters"
+					Layout.fillWidth: true
+					model: retargetSetup.subjectParametersModel
+				}
+
+				OrlexLabel {
+					objectName: "currentFile"
+					Layout.fillWidth: true
+					text: "Current file: " + (retargetSetup.currentTargetSubjectURL
+						? Tessel.fileName(retargetSetup.currentTargetSubjectURL) : "*None*")
+				}
+
+				RowLayout {
+					id: fileButtons
+					spacing: Theme.spacing
+
+					OrlexButton {
+						objectName: "createTargetSubject"
+						Layout.fillWidth: true
+						text: "Create Target Subject"
+						toolTip: "Create a retarget skeleton for the selected FBX"
+						onClicked: ContextRetargetSetup.CreateTargetSubject()
+					}
+					OrlexButton {
+						objectName: "load"
+						text: "Load"
+						toolTip: "Load an existing retarget skeleton from disk"
+						onClicked: loadDialog.open()
+					}
+					OrlexButton {
+						objectName: "save"
+						text: "Save"
+						toolTip: "Save the current retarget skeleton to the last filename"
+						enabled: !!retargetSetup.currentTargetSubjectURL
+						onClicked: retargetSetup.save()
+					}
+					OrlexButton {
+						objectName: "saveAs"
+						text: "Save As"
+						toolTip: "Save the current retarget skeleton to a new file"
+						onClicked: saveDialog.open()
+					}
+				}
+
+				RowLayout {
+					id: jointControls
+					spacing: Theme.spacing
+
+					OrlexButton {
+						objectName: "createAllJoints"
+						Layout.fillWidth: true
+						text: "Create all joints"
+						toolTip: "Add a joint to every segment in the retarget skeleton"
+						onClicked: ContextRetargetSetup.CreateAllJoints()
+					}
+					OrlexButton {
+						objectName: "removeUnnecessaryJoints"
+						Layout.fillWidth: true
+						text: "Remove unnecessary joints"
+						toolTip: "Remove joints from segments with no targets on themselves or their children"
+						onClicked: ContextRetargetSetup.RemoveUnnecessaryJoints()
+					}
+					PropertyCheckBox {
+						id: jointSymmetry
+						objectName: "jointSymmetry"
+						Layout.preferredWidth: leftColumn.symmetryWidth
+						text: "Joint symmetry"
+						toolTip: "Apply mirrored rotation to left and right segments"
+						target: ContextRetargetSetup
+						property: "jointSymmetry"
+					}
+				}
+
+				RowLayout {
+					id: addControls
+					spacing: Theme.spacing
+
+					OrlexButton {
+						objectName: "addPositionTarget"
+						Layout.fillWidth: true
+						text: "Add position target"
+						toolTip: "Add a world-space position target for the selected segments. Shortcut: Alt+T"
+						enabled: retargetSetup.canAddTarget
+						onClicked: retargetSetup.addTarget(true)
+					}
+					OrlexButton {
+						objectName: "addRotationTarget"
+						Layout.fillWidth: true
+						text: "Add rotation target"
+						toolTip: "Add a world-space rotation target for the selected segments. Shortcut: Alt+R"
+						enabled: retargetSetup.canAddTarget
+						onClicked: retargetSetup.addTarget(false)
+					}
+					OrlexCheckBox {
+						id: targetSymmetry
+						objectName: "targetSymmetry"
+						Layout.preferredWidth: leftColumn.symmetryWidth
+						text: "Target symmetry"
+						toolTip: "Create matching targets on left and right"
+					}
+				}
+
+				OrlexButton {
+					objectName: "updateTargets"
+					Layout.fillWidth: true
+					text: "Update targets"
+					toolTip: "Recalculate offsets to each target based on the current pose"
+					onClicked: ContextRetargetSetup.UpdateTargets()
+				}
+
+				RetargetSetupTargetTable {
+					objectName: "targets"
+					Layout.fillWidth: true
+					Layout.fillHeight: true
+					Layout.minimumHeight: 6 * Theme.itemHeight
+				}
+
+				OrlexButton {
+					objectName: "removeTarget"
+					Layout.fillWidth: true
+					text: "Remove target"
+					toolTip: "Delete the selected target"
+					enabled: RetargetSetupSelection.selectedTarget !== -1
+					onClicked: ContextRetargetSetup.RemoveTarget(RetargetSetupSelection.selectedTarget)
+				}
+
+				ParameterView {
+					objectName: "targetParameters"
+					Layout.fillWidth: true
+					model: retargetSetup.targetParametersModel
+				}
+			}
+		}
+
+		ColumnLayout {
+			id: middle
+
+			SplitView.fillWidth: true
+			SplitView.minimumWidth: viewControls.implicitWidth + 2 * Theme.margin
+			spacing: 0
+
+			RowLayout {
+				id: viewControls
+				Layout.margins: Theme.spacing
+				spacing: Theme.spacing
+
+				OrlexComboBox {
+					id: cameraTypes
+					objectName: "cameraType"
+					Layout.preferredWidth: 100
+					Accessible.name: "Camera"
+					model: ["Perspective", "Front", "Back", "Left", "Right", "Top", "Bottom"]
+					currentIndex: 0
+				}
+				OrlexButton {
+					id: viewFilters
+					objectName: "viewFilters"
+					text: "View Filters"
+					checkable: true
+					checked: true
+				}
+				OrlexButton {
+					objectName: "showManipulator"
+					text: "Show Manipulator"
+					checkable: true
+					checked: true
+					onToggled: sceneFBO.sceneOptions["Manipulator"] = checked
+				}
+			}
+
+			Item {
+				Layout.fillWidth: true
+				Layout.fillHeight: true
+				clip: true
+
+				SceneFramebufferObject {
+					id: sceneFBO
+
+					objectName: "scene"
+					anchors.fill: parent
+					scene: FlowScene
+					focusSelection: FocusSelection
+					cameraType: cameraTypes.currentIndex
+					Accessible.role: Accessible.Graphic
+					Accessible.name: "Preview"
+
+					Component.onCompleted: {
+						const options = {
+							"LabellingSubject-Enabled": true,
+							"LabellingSubject-Markers": false,
+							"LabellingSubject-Sticks": false,
+							"LabellingSubject-Targets": false,
+							"LabellingSubject-SkinXRay": true,
+							"SolvingSubject-Markers": false,
+							"SolvingSubject-Sticks": false,
+							"SolvingSubject-MissingMarkers": false,
+							"SolvingSubject-SkinXRay": true,
+							"SolvingSubject-Targets": true
+						}
+						for (const key in options)
+							sceneOptions[key] = options[key]
+					}
+				}
+
+				Column {
+					objectName: "filters"
+					visible: viewFilters.checked
+					x: Theme.margin
+					y: Theme.margin
+
+					Repeater {
+						model: [
+							{ text: "Constraints", option: "SolvingSubject-Targets", other: "", indent: 0 },
+							{ text: "Joints", option: "LabellingSubject-Joints", other: "SolvingSubject-Joints", indent: 0 },
+							{ text: "Segment Axes", option: "LabellingSubject-Axes", other: "SolvingSubject-Axes", indent: 0 },
+							{ text: "Source Skin", option: "LabellingSubject-Skin", other: "", indent: 0 },
+							{ text: "Source Skin X-Ray", option: "LabellingSubject-SkinXRay", other: "", indent: 10 },
+							{ text: "Target Skin", option: "SolvingSubject-Skin", other: "", indent: 0 },
+							{ text: "Target Skin X-Ray", option: "SolvingSubject-SkinXRay", other: "", indent: 10 }
+						]
+
+						PropertyCheckBox {
+							objectName: "filter" + modelData.text.replace(/[ -]/g, "")
+							x: modelData.indent
+							text: modelData.text
+							target: sceneFBO.sceneOptions
+							property: modelData.option
+							onToggled: {
+								if (modelData.other !== "")
+									sceneFBO.sceneOptions[modelData.other] = checked
+							}
+						}
+					}
+				}
+
+				SceneToolTip {
+					scene: sceneFBO
+				}
+			}
+		}
+
+		ColumnLayout {
+			id: right
+
+			implicitWidth: 200
+			SplitView.preferredWidth: 200
+			SplitView.minimumWidth: 120
+			spacing: 0
+
+			OrlexLabel {
+				Layout.margins: Theme.spacing
+				Layout.fillWidth: true
+				text: "Source Segments"
+				color: Theme.windowText
+			}
+			RetargetSetupSegmentList {
+				objectName: "sourceSegments"
+				Layout.fillWidth: true
+				Layout.fillHeight: true
+				title: "Source Segments"
+				model: SourceSegmentModel
+				selectedIndex: RetargetSetupSelection.selectedSourceSegment
+			}
+			OrlexLabel {
+				Layout.margins: Theme.spacing
+				Layout.fillWidth: true
+				text: "Target Segments"
+				color: Theme.bright
+			}
+			RetargetSetupSegmentList {
+				objectName: "targetSegments"
+				Layout.fillWidth: true
+				Layout.fillHeight: true
+				title: "Target Segments"
+				model: TargetSegmentModel
+				selectedIndex: RetargetSetupSelection.selectedTargetSegment
+			}
+		}
+	}
+}

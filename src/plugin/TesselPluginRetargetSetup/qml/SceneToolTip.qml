@@ -1,0 +1,27 @@
+import QtQuick 2.15
+import QtQuick.Controls 2.15
+import Orlex.Theme 1.0
+
+// Tells beside the mouse what it points at in a scene.
+ToolTip {
+	id: toolTip
+
+	property var scene: null
+
+	text: scene ? scene.toolTipText : ""
+	x: scene ? scene.mousePos.x + 10 : 0
+	y: scene ? scene.mousePos.y + 10 : 0
+	visible: text !== ""
+	delay: Theme.infoToolTipDelay
+
+	contentItem: Text {
+		text: toolTip.text
+		textFormat: Text.PlainText
+		color: "white"
+		font.pointSize: 10
+	}
+	background: Rectangle {
+		color: "#A0000000"
+		radius: 5
+	}
+}

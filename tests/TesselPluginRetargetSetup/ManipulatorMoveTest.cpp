@@ -1,0 +1,120 @@
+#include "TesselPluginRetargetSetup/ManipulatorMove.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <numbers>
+
+namespace
+{
+
+using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectParametrised;
+
+constexpr double c_Quarter = std::numbers::pi / 2;
+
+QMatrix4x4 Place(float i_X, float i_Y, float i_Z, float i_Degrees = 0.0f, QVector3D i_Axis = {0, 0, 1})
+{
+	QMatrix4x4 matrix;
+	matrix.translate(i_X, i_Y, i_Z);
+	matrix.rotate(i_Degrees, i_Axis);
+	return matrix;
+}
+
+void ExpectNear(const std::vector<double>& i_rActual, const std::vector<double>& i_rExpected)
+{
+	ASSERT_EQ(i_rActual.size(), i_rExpected.size());
+	for (std::size_t i = 0; i < i_rActual.size(); ++i)
+		EXPECT_NEAR(i_rActual[i], i_rExpected[i], 1e-5) << i;
+}
+
+/// hips with two arms, one on each side.
+VSubjectParametrised Subject()
+{
+	VSubjectParametrised subject;
+	subject.m_Segments.resize(3);
+	const char* const names[] = {"hips", "armLeft", "armRight"};
+	for (std::size_t i = 0; i < 3; ++i)
+	{
+		subject.m_Segments[i].m_Name = names[i];
+		subject.m_Segments[i].m_Joint.m_BindPose.assign(i == 0 ? 6 : 3, 0.125);
+	}
+	return subject;
+}
+
+QMatrix4x4 Frame(std::size_t i_Segment)
+{
+	return i_Segment == 0 ? Place(0, 0, 1000) : Place(i_Segment == 1 ? 200.0f : -200.0f, 0, 1400);
+}
+
+TEST(ManipulatorMove, JointFrameIsTheParentsPlaceThenTheSegmentsOwn)
+{
+	VSubject::VSegment segment;
+	segment.m_PreRotation = {0.0, 0.0, c_Quarter};
+	segment.m_PreTranslation = {10.0, 20.0, 30.0};
+	const QMatrix4x4 frame = RetargetSetup::JointFrame(Place(1, 2, 3, 90), segment);
+	const QVector3D origin = frame.map(QVector3D(0, 0, 0));
+	EXPECT_LT((origin - QVector3D(1 - 20, 2 + 10, 33)).length(), 1e-4f);
+	EXPECT_LT((frame.mapVector(QVector3D(1, 0, 0)) - QVector3D(-1, 0, 0)).length(), 1e-5f) << "two quarter turns";
+}
+
+TEST(ManipulatorMove, TheRootMovesAndTurnsAndOthersOnlyTurn)
+{
+	VSubjectParametrised subject = Subject();
+	EXPECT_TRUE(RetargetSetup::MoveSegment(subject, 0, Place(5, 6, 1007, 90), Frame(0), true, Frame));
+	ExpectNear(subject.m_Segments[0].m_Joint.m_BindPose, {0, 0, c_Quarter, 5, 6, 1007});
+	EXPECT_EQ(subject.m_Segments[0].m_Joint.m_Mean, subject.m_Segments[0].m_Joint.m_BindPose);
+	ExpectNear(subject.m_Segments[1].m_Joint.m_BindPose, {0.125, 0.125, 0.125});
+
+	EXPECT_TRUE(RetargetSetup::MoveSegment(subject, 1, Place(999, 6, 1007, 90, {1, 0, 0}), Frame(1), false, Frame));
+	ExpectNear(subject.m_Segments[1].m_Joint.m_BindPose, {c_Quarter, 0, 0});
+	ExpectNear(subject.m_Segments[2].m_Joint.m_BindPose, {0.125, 0.125, 0.125});
+
+	EXPECT_FALSE(RetargetSetup::MoveSegment(subject, 3, {}, {}, true, Frame));
+}
+
+TEST(ManipulatorMove, TheOtherSideIsMirroredAcrossThePlaneBetweenTheJoints)
+{
+	struct VCase
+	{
+		const char* m_pName;
+		QVector3D m_Axis;
+		std::vector<double> m_Mirrored;
+	};
+	// The joints lie on the X axis of the world: a turn about it is the same on both sides, one across it turns round.
+	const VCase cases[] = {
+	    {"along the line", {1, 0, 0}, {c_Quarter, 0, 0}},
+	    {"across the line", {0, 1, 0}, {0, -c_Quarter, 0}},
+	    {"upright", {0, 0, 1}, {0, 0, -c_Quarter}},
+	};
+	for (const VCase& rCase : cases)
+	{
+		SCOPED_TRACE(rCase.m_pName);
+		VSubjectParametrised subject = Subject();
+		ASSERT_TRUE(
+		    RetargetSetup::MoveSegment(subject, 1, Place(200, 0, 1400, 90, rCase.m_Axis), Frame(1), true, Frame));
+		ExpectNear(subject.m_Segments[2].m_Joint.m_BindPose, rCase.m_Mirrored);
+		EXPECT_EQ(subject.m_Segments[2].m_Joint.m_Mean, subject.m_Segments[2].m_Joint.m_BindPose);
+	}
+}
+
+TEST(ManipulatorMove, TheMirrorIsMeasuredInTheOtherJointsOwnFrame)
+{
+	const auto turnedFrame = [](std::size_t i_Segment)
+	{ return i_Segment == 2 ? Place(-200, 0, 1400, 90) : Frame(i_Segment); };
+	VSubjectParametrised subject = Subject();
+	ASSERT_TRUE(
+	    RetargetSetup::MoveSegment(subject, 1, Place(200, 0, 1400, 90, {1, 0, 0}), Frame(1), true, turnedFrame));
+	// The world's X axis is the negative Y axis of a frame that is turned by a quarter about Z.
+	ExpectNear(subject.m_Segments[2].m_Joint.m_BindPose, {0, -c_Quarter, 0});
+}
+
+TEST(ManipulatorMove, JointsInOnePlaceTurnTheRotationRound)
+{
+	VSubjectParametrised::VSegment mirror;
+	mirror.m_Joint.m_BindPose = {0.0, 0.0};
+	RetargetSetup::PoseMirrorSegment(mirror, {}, Place(0, 0, 0, 90, {0, 1, 0}), {}, {});
+	ExpectNear(mirror.m_Joint.m_BindPose, {0, -c_Quarter});
+}
+
+} // namespace
