@@ -1,0 +1,310 @@
+import QtQuick 2.15
+import QtQuick.Templates 2.15 as T
+import Orlex.Theme 1.0
+
+// Picks one of a list of texts. A long list can be filtered by typing: an entry stays if it holds every word typed, in
+// any case. Leading spaces of an entry indent it.
+T.Control {
+	id: control
+
+	// A list of texts.
+	property var model: []
+	property int currentIndex: -1
+	readonly property int count: model ? model.length : 0
+	readonly property string currentText: currentIndex >= 0 && currentIndex < count ? model[currentIndex].trim() : ""
+	// What the closed box shows.
+	property string displayText: currentText
+	property string placeholderText: ""
+	property string toolTip: ""
+	property bool filterable: count > 12
+	property bool invalid: false
+	property color textColor: Theme.text
+	readonly property alias popup: popup
+
+	// The operator picked an entry; currentIndex is it already.
+	signal activated(int index)
+
+	function pick(index) {
+		popup.close()
+		if (index < 0 || index >= count)
+			return
+		currentIndex = index
+		activated(index)
+	}
+	function step(by) {
+		const index = Math.max(0, Math.min(count - 1, currentIndex + by))
+		if (count > 0 && index !== currentIndex)
+			pick(index)
+	}
+	function open(filter) {
+		filterField.text = filterable ? filter : ""
+		popup.refill()
+		popup.open()
+	}
+
+	implicitWidth: 140
+	implicitHeight: Theme.controlHeight
+	leftPadding: 6
+	rightPadding: 4
+	font.pixelSize: Theme.fontSize
+	focusPolicy: Qt.StrongFocus
+	hoverEnabled: true
+	Accessible.role: Accessible.ComboBox
+	Accessible.name: placeholderText
+	Accessible.description: displayText
+	Accessible.onPressAction: open("")
+
+	Keys.onPressed: {
+		event.accepted = true
+		if (event.key === Qt.Key_F4 || event.key === Qt.Key_Space || event.key === Qt.Key_Return
+				|| event.key === Qt.Key_Enter || event.key === Qt.Key_Down && event.modifiers & Qt.AltModifier)
+			open("")
+		else if (event.key === Qt.Key_Up)
+			step(-1)
+		else if (event.key === Qt.Key_Down)
+			step(1)
+		else if (event.key === Qt.Key_Home)
+			step(-count)
+		else if (event.key === Qt.Key_End)
+			step(count)
+		else if (filterable && event.text.trim() !== "" && !(event.modifiers & (Qt.ControlModifier | Qt.AltModifier)))
+			open(event.text)
+		else
+			event.accepted = false
+	}
+
+	background: FieldFrame {
+		focused: control.visualFocus || popup.visible
+		hovered: control.hovered
+		invalid: control.invalid
+		color: !control.enabled ? Theme.window : popup.visible ? Theme.base : Theme.button
+	}
+
+	contentItem: MouseArea {
+		acceptedButtons: Qt.LeftButton
+		onPressed: {
+			control.forceActiveFocus(Qt.MouseFocusReason)
+			if (popup.visible)
+				popup.close()
+			else
+				control.open("")
+		}
+
+		Text {
+			id: caption
+			anchors.left: parent.left
+			anchors.right: mark.visible ? mark.left : arrow.left
+			anchors.rightMargin: 4
+			height: parent.height
+			text: control.displayText !== "" ? control.displayText : control.placeholderText
+			textFormat: Text.PlainText
+			font: control.font
+			color: !control.enabled || control.displayText === "" ? Theme.disabledText : control.textColor
+			verticalAlignment: Text.AlignVCenter
+			elide: Text.ElideMiddle
+		}
+		SideMark {
+			id: mark
+			name: control.filterable ? control.displayText : ""
+			anchors.right: arrow.left
+			anchors.rightMargin: 4
+			anchors.verticalCenter: parent.verticalCenter
+		}
+		Chevron {
+			id: arrow
+			anchors.right: parent.right
+			anchors.verticalCenter: parent.verticalCenter
+			rotation: 90
+			ink: control.enabled ? Theme.windowText : Theme.disabledText
+		}
+	}
+
+	Loader {
+		active: control.hovered && !popup.visible && (control.toolTip !== "" || caption.truncated)
+		sourceComponent: OrlexToolTip {
+			parent: control
+			visible: true
+			text: caption.truncated && control.toolTip !== "" ? control.displayText + "\n" + control.toolTip
+				: caption.truncated ? control.displayText : control.toolTip
+		}
+	}
+
+	onModelChanged: if (popup.visible) popup.refill()
+
+	T.Popup {
+		id: popup
+
+		// Indices of the entries that the filter leaves.
+		property var rows: []
+		property bool hadFocus: false
+		readonly property real wanted: rowsHeight + (control.filterable ? Theme.controlHeight + 24 : 0) + 2 * padding
+		readonly property real rowsHeight: Math.max(1, Math.min(control.count, 18)) * Theme.itemHeight
+
+		function refill() {
+			const words = filterField.text.toLowerCase().split(" ").filter(word => word !== "")
+			const before = rows.length > 0 && list.currentIndex >= 0 ? rows[list.currentIndex] : control.currentIndex
+			const found = []
+			for (let i = 0; i < control.count; ++i) {
+				const entry = words.length > 0 ? control.model[i].toLowerCase() : ""
+				if (words.every(word => entry.includes(word)))
+					found.push(i)
+			}
+			rows = found
+			list.currentIndex = found.length > 0 ? Math.max(0, found.indexOf(before)) : -1
+			list.positionViewAtIndex(list.currentIndex, ListView.Contain)
+		}
+		// Below the box, or above it where there is more room.
+		function place() {
+			const box = control.mapToItem(null, 0, 0)
+			const room = control.Window.height
+			const below = room - box.y - control.height - 6
+			const above = box.y - 6
+			const up = below < wanted && above > below
+			height = Math.min(wanted, up ? above : below)
+			y = up ? -height - 2 : control.height + 2
+		}
+
+		objectName: control.objectName + "Popup"
+		width: Math.max(control.width, control.filterable ? 260 : 0)
+		margins: 2
+		padding: 1
+		focus: true
+		closePolicy: T.Popup.CloseOnEscape | T.Popup.CloseOnPressOutsideParent
+		onAboutToShow: {
+			list.currentIndex = rows.indexOf(control.currentIndex)
+			if (list.currentIndex < 0 && rows.length > 0)
+				list.currentIndex = 0
+			place()
+		}
+		onOpened: {
+			if (control.filterable)
+				filterField.forceActiveFocus()
+			else
+				list.forceActiveFocus()
+			list.positionViewAtIndex(list.currentIndex, ListView.Center)
+		}
+		onAboutToHide: hadFocus = popup.activeFocus
+		onClosed: if (hadFocus) control.forceActiveFocus(Qt.PopupFocusReason)
+
+		background: Rectangle {
+			color: Theme.dark
+			border.color: Theme.disabledText
+			radius: Theme.radius
+		}
+
+		contentItem: FocusScope {
+			Keys.onPressed: {
+				event.accepted = true
+				const page = Math.max(1, Math.floor(list.height / Theme.itemHeight) - 1)
+				const move = by => list.currentIndex = Math.max(0, Math.min(list.count - 1, list.currentIndex + by))
+				if (event.key === Qt.Key_Up)
+					move(-1)
+				else if (event.key === Qt.Key_Down)
+					move(1)
+				else if (event.key === Qt.Key_PageUp)
+					move(-page)
+				else if (event.key === Qt.Key_PageDown)
+					move(page)
+				else if (event.key === Qt.Key_Home)
+					move(-list.count)
+				else if (event.key === Qt.Key_End)
+					move(list.count)
+				else if (event.key === Qt.Key_Return || event.key === Qt.Key_Enter
+						|| event.key === Qt.Key_Space && !control.filterable)
+					control.pick(list.currentIndex >= 0 ? popup.rows[list.currentIndex] : -1)
+				else if (event.key === Qt.Key_Tab || event.key === Qt.Key_Backtab)
+					popup.close()
+				else
+					event.accepted = false
+			}
+
+			OrlexTextField {
+				id: filterField
+				objectName: control.objectName + "Filter"
+				visible: control.filterable
+				enabled: visible
+				focus: visible
+				x: 3
+				y: 3
+				width: parent.width - 6
+				placeholderText: "Type to filter"
+				onTextEdited: popup.refill()
+			}
+
+			ListView {
+				id: list
+				objectName: control.objectName + "List"
+				anchors.fill: parent
+				anchors.topMargin: control.filterable ? filterField.height + 6 : 0
+				anchors.bottomMargin: control.filterable ? 18 : 0
+				clip: true
+				focus: !control.filterable
+				model: popup.visible ? popup.rows : []
+				boundsBehavior: Flickable.StopAtBounds
+				highlightMoveDuration: 0
+				keyNavigationEnabled: false
+				T.ScrollBar.vertical: OrlexScrollBar {}
+
+				delegate: MouseArea {
+					id: entry
+
+					readonly property string text: modelData < control.count ? control.model[modelData] : ""
+					readonly property string name: text.trim()
+					readonly property int depth: text.length - text.replace(/^ +/, "").length
+
+					width: list.width
+					height: Theme.itemHeight
+					hoverEnabled: true
+					// Not on entering: the list also moves under a mouse that stands still.
+					onPositionChanged: list.currentIndex = index
+					onClicked: control.pick(modelData)
+					Accessible.role: Accessible.ListItem
+					Accessible.name: name
+
+					Rectangle {
+						anchors.fill: parent
+						color: modelData === control.currentIndex ? Theme.light
+							: entry.ListView.isCurrentItem ? Theme.midlight : "transparent"
+						border.width: entry.ListView.isCurrentItem ? 1 : 0
+						border.color: Theme.active
+					}
+					OrlexLabel {
+						x: 6 + Math.min(7 * entry.depth, 0.4 * parent.width)
+						width: parent.width - x - 12 - entryMark.width - 4
+						height: parent.height
+						text: entry.name
+						color: Theme.text
+					}
+					SideMark {
+						id: entryMark
+						name: control.filterable ? entry.name : ""
+						anchors.right: parent.right
+						anchors.rightMargin: 14
+						anchors.verticalCenter: parent.verticalCenter
+					}
+				}
+			}
+			Text {
+				visible: list.count === 0
+				anchors.fill: list
+				text: control.count === 0 ? "Nothing to choose from" : "Nothing holds \"" + filterField.text.trim() + "\""
+				textFormat: Text.PlainText
+				elide: Text.ElideRight
+				font.pixelSize: Theme.fontSize
+				color: Theme.disabledText
+				horizontalAlignment: Text.AlignHCenter
+				verticalAlignment: Text.AlignVCenter
+			}
+			Text {
+				visible: control.filterable
+				anchors.bottom: parent.bottom
+				x: 6
+				height: 18
+				text: list.count === control.count ? control.count + " entries" : list.count + " of " + control.count
+				font.pixelSize: Theme.fontSize - 2
+				color: Theme.disabledText
+				verticalAlignment: Text.AlignVCenter
+			}
+		}
+	}
+}

@@ -1,0 +1,47 @@
+import QtQuick 2.15
+import Orlex.Controls 1.0
+import Orlex.Theme 1.0
+
+// One of the permitted values. A value that is none of them (a file may bring one) is shown as it is, in the colour of
+// a warning.
+Item {
+	id: editor
+
+	property var row
+	readonly property int chosen: row && row.parameter.currentEnumIndex !== undefined ? row.parameter.currentEnumIndex : -1
+	readonly property bool foreign: chosen < 0 && !!row && row.valueText !== ""
+
+	function follow() {
+		box.currentIndex = Qt.binding(() => chosen)
+	}
+
+	implicitHeight: Theme.controlHeight
+	Component.onCompleted: follow()
+
+	OrlexComboBox {
+		id: box
+		objectName: editor.row ? editor.row.name : ""
+		width: parent.width - (fileButton.visible ? fileButton.width + 4 : 0)
+		model: editor.row ? editor.row.enumNames : []
+		displayText: currentIndex >= 0 ? currentText : editor.foreign ? editor.row.valueText : ""
+		placeholderText: count > 0 ? "Not set" : "Nothing to choose from"
+		textColor: editor.foreign ? Theme.warning : Theme.text
+		toolTip: editor.foreign ? "This value is not in the list" : ""
+		invalid: !!editor.row && editor.row.error !== ""
+		Accessible.name: editor.row ? editor.row.label : ""
+		onActivated: {
+			editor.row.error = editor.row.groupModel.setEnumIndex(editor.row.parameterIndex, index) ? ""
+				: "This value cannot be set"
+			editor.follow()
+		}
+		Keys.onEscapePressed: {
+			event.accepted = invalid
+			editor.row.error = ""
+		}
+	}
+	FileButton {
+		id: fileButton
+		row: editor.row
+		anchors.right: parent.right
+	}
+}

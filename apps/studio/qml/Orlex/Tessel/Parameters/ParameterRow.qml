@@ -1,0 +1,137 @@
+import QtQuick 2.15
+import Orlex.Controls 1.0
+import Orlex.Theme 1.0
+
+// One parameter: its label, the editor for its kind, why the last input was refused.
+Item {
+	id: row
+
+	// The row's roles, its place, and the model that takes what is typed.
+	property var parameter
+	property int parameterIndex: -1
+	property var groupModel
+	property int labelWidth: 100
+
+	property string error: ""
+	readonly property string name: parameter.name
+	readonly property string label: parameter.display || parameter.name
+	readonly property string toolTip: parameter.description || ""
+	readonly property string valueText: parameter.valueText === undefined ? "" : parameter.valueText
+	readonly property string defaultText: parameter.defaultText || ""
+	readonly property var enumNames: parameter.enumNames || []
+	readonly property bool enumerated: parameter.enumerated === undefined ? enumNames.length > 0 : parameter.enumerated
+	readonly property bool bounded: isNumber(parameter.minimum) && isNumber(parameter.maximum)
+		&& parameter.maximum > parameter.minimum
+	readonly property bool checkable: parameter.presentationHint === checkableSlider
+		|| parameter.presentationHint === checkableOption && parameter.type !== "bool"
+	// A parameter that can be switched off is edited only while it has a value.
+	readonly property bool editable: !checkable || !!parameter.hasValue
+
+	// Presentation hints and kinds of file access, as the store numbers them.
+	readonly property int slider: 1
+	readonly property int multiLine: 2
+	readonly property int checkableOption: 3
+	readonly property int checkableSlider: 4
+	readonly property int colour: 5
+	readonly property int noFile: 0
+
+	function isNumber(value) {
+		return typeof value === "number" && isFinite(value)
+	}
+	// Hands a text to the parameter: true if it was taken. Otherwise the reason stands in "error" and the parameter
+	// keeps what it had.
+	function commit(text) {
+		error = groupModel.setValueText(parameterIndex, text)
+		return error === ""
+	}
+	function editorUrl() {
+		const hint = parameter.presentationHint
+		if (enumerated)
+			return "EnumerationEditor.qml"
+		if (parameter.type === "bool")
+			return "BoolEditor.qml"
+		if ((hint === slider || hint === checkableSlider) && bounded && parameter.type !== "text")
+			return "SliderEditor.qml"
+		if (hint === multiLine && parameter.type === "text")
+			return "MultiLineEditor.qml"
+		if (hint === colour)
+			return "ColourEditor.qml"
+		return "TextEditor.qml"
+	}
+
+	objectName: name + "Row"
+	implicitHeight: Math.max(Theme.controlHeight, editor.y + editor.height)
+		+ (reason.visible ? reason.implicitHeight + 2 : 0)
+	// What was refused belongs to the value that it was typed over.
+	onValueTextChanged: error = ""
+
+	OrlexCheckBox {
+		id: switcher
+		objectName: row.name + "Switch"
+		visible: row.checkable
+		width: visible ? implicitWidth : 0
+		Accessible.name: row.label + " is set"
+		Component.onCompleted: checked = Qt.binding(() => !!row.parameter.hasValue)
+		onToggled: {
+			if (checked)
+				row.commit(row.defaultText !== "" ? row.defaultText
+					: row.isNumber(row.parameter.minimum) ? String(row.parameter.minimum)
+					: row.enumerated && row.parameter.enumTexts.length > 0 ? row.parameter.enumTexts[0] : row.valueText)
+			else
+				row.groupModel.resetToDefault(row.parameterIndex)
+			checked = Qt.binding(() => !!row.parameter.hasValue)
+		}
+	}
+	OrlexLabel {
+		x: switcher.width
+		width: row.labelWidth - x
+		height: Theme.controlHeight
+		text: row.label
+		toolTip: row.toolTip
+		enabled: row.editable
+	}
+	Loader {
+		id: editor
+		x: row.labelWidth + Theme.spacing
+		width: row.width - x - resetter.width - 2
+		enabled: row.editable
+		Component.onCompleted: source = Qt.binding(() => row.editorUrl())
+		onLoaded: {
+			item.row = row
+			item.width = Qt.binding(() => editor.width)
+		}
+	}
+	OrlexButton {
+		id: resetter
+		objectName: row.name + "Reset"
+		anchors.right: parent.right
+		width: 16
+		height: Theme.controlHeight
+		leftPadding: 0
+		rightPadding: 0
+		text: "\u21ba"
+		toolTip: "Back to the default" + (row.defaultText !== "" ? ": " + row.defaultText : "")
+		Accessible.name: row.label + ": back to the default"
+		visible: !row.checkable && row.defaultText !== "" && row.valueText !== row.defaultText
+		background: null
+		onClicked: {
+			row.error = ""
+			row.groupModel.resetToDefault(row.parameterIndex)
+		}
+	}
+	Text {
+		id: reason
+		objectName: row.name + "Reason"
+		visible: row.error !== ""
+		x: editor.x
+		y: editor.height + 2
+		width: row.width - x
+		text: row.error
+		textFormat: Text.PlainText
+		wrapMode: Text.Wrap
+		font.pixelSize: Theme.fontSize - 1
+		color: Theme.error
+		Accessible.role: Accessible.AlertMessage
+		Accessible.name: text
+	}
+}

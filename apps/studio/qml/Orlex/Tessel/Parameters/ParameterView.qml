@@ -1,0 +1,44 @@
+import QtQuick 2.15
+import Orlex.Controls 1.0
+import Orlex.Theme 1.0
+
+// A row for each parameter of a group model: label, editor and the way back to the default. Advanced parameters stand
+// behind a fold. The editor of the parameter "X" has the objectName "X", its row "XRow".
+FocusScope {
+	id: view
+
+	property var model: null
+	property int labelWidth: 100
+	property alias advancedShown: fold.checked
+
+	implicitWidth: 260
+	implicitHeight: column.implicitHeight
+	Accessible.role: Accessible.Grouping
+	Accessible.name: objectName
+
+	Column {
+		id: column
+		width: parent.width
+		spacing: Theme.spacing / 2
+
+		ParameterSection {
+			width: parent.width
+			model: view.model
+			labelWidth: view.labelWidth
+		}
+		OrlexDisclosure {
+			id: fold
+			objectName: view.objectName + "Advanced"
+			visible: advanced.shownCount > 0
+			text: "Advanced"
+		}
+		ParameterSection {
+			id: advanced
+			width: parent.width
+			model: view.model
+			labelWidth: view.labelWidth
+			advanced: true
+			visible: fold.checked && shownCount > 0
+		}
+	}
+}

@@ -1,0 +1,59 @@
+import QtQuick 2.15
+import Orlex.Controls 1.0
+import Orlex.Theme 1.0
+
+// A value as one line of text, with a button for a parameter that names files. Enter and leaving the field commit,
+// Escape brings back what the parameter holds.
+Item {
+	id: editor
+
+	property var row
+	readonly property string valueText: row ? row.valueText : ""
+	property bool edited: false
+
+	function restore() {
+		edited = false
+		field.text = Qt.binding(() => valueText)
+	}
+	function commit() {
+		if (!edited)
+			return
+		edited = false
+		if (row.commit(field.text))
+			restore()
+	}
+
+	implicitHeight: Theme.controlHeight
+	onValueTextChanged: restore()
+	Component.onCompleted: restore()
+
+	OrlexTextField {
+		id: field
+		objectName: editor.row ? editor.row.name : ""
+		width: parent.width - (fileButton.visible ? fileButton.width + 4 : 0)
+		height: Theme.controlHeight
+		error: editor.row ? editor.row.error : ""
+		placeholderText: editor.row && !editor.row.parameter.hasValue ? editor.row.defaultText : ""
+		Accessible.name: editor.row ? editor.row.label : ""
+		onTextEdited: {
+			editor.edited = true
+			editor.row.error = ""
+		}
+		onEditingFinished: {
+			editor.commit()
+			// The start of a long text tells more than its end.
+			if (!activeFocus)
+				cursorPosition = 0
+		}
+		Keys.onEscapePressed: {
+			event.accepted = editor.edited || error !== ""
+			editor.row.error = ""
+			editor.restore()
+		}
+	}
+	FileButton {
+		id: fileButton
+		row: editor.row
+		anchors.right: parent.right
+	}
+}
