@@ -208,6 +208,44 @@ TEST_F(Document, OffsetsFollowThePoseOnlyWhenUpdated)
 	    (std::vector<std::string>{"-150.000000*GlobalScale", "-300.000000*GlobalScale", "100.000000*GlobalScale"}));
 }
 
+TEST_F(Document, TheNextScaleLeavesThePresentSubject)
+{
+	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
+	m_Document.CreateTargetSubject();
+	m_Changes = 0;
+	m_Document.SetNextTargetScale(3.0);
+	m_Document.SetNextTargetScale(0.0);
+	EXPECT_EQ(m_Changes, 0);
+	EXPECT_EQ(m_Document.GetTargetScale(), 1.0);
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(m_Document.GetTargetScale(), 3.0);
+}
+
+TEST_F(Document, TheOperatorIsToldWhichSourceASavedFileNames)
+{
+	const auto save = [this]
+	{
+		VLogRecorder log;
+		m_Document.SaveTargetSubjectURL(QUrl::fromLocalFile(QString::fromStdString((m_Folder / "a.qrr").string())));
+		std::string first = log.Take();
+		return first.substr(0, first.find('\n'));
+	};
+	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(save(), "3 RetargetSetup: The saved subject names no source skeleton: it was made before one was chosen");
+	ASSERT_TRUE(m_Document.LoadSourceSubject(RETARGET_SOURCE "/demo/performer.qrs", ""));
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(save().find("names"), std::string::npos);
+	ASSERT_TRUE(m_Document.LoadSourceSubject(RETARGET_TEST_DATA "/qrt/version-3.5.qrs", ""));
+	EXPECT_EQ(m_Document.GetShownSourceName(), "version-3.5");
+	EXPECT_EQ(save(),
+	    "3 RetargetSetup: The saved subject names source skeleton 'performer', and the one that is shown "
+	    "is 'version-3.5'");
+	ASSERT_EQ(m_Document.LoadTargetSubject(m_Folder / "a.qrr"), 0u);
+	EXPECT_EQ(m_Document.GetSourceName(), "performer");
+	EXPECT_EQ(m_Document.GetShownSourceName(), "version-3.5") << "no source was loaded";
+}
+
 TEST_F(Document, TheScale)
 {
 	m_Document.SetTargetScale(0.5);

@@ -101,6 +101,9 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	        "'ftp://a/b.qrr' is no file on this computer."},
 	    {"both", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(Url("no/such/a.qrr")); },
 	        "Nothing was saved: '" + File("no/such/a.qrr") + "' could not be written, and is as it was."},
+	    {"both", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(Url("a.qrx")); },
+	        "Nothing was saved: '" + File("a.qrx")
+	            + "' is a legacy file, and those are only read. Choose a name that ends in .qrr."},
 	    {"a broken target", [this] { BreakTree(*m_Document.TargetValues().m_pParametrised, false); }, "AddTarget",
 	        [this] { m_Document.AddTarget(1, 1, true, false); },
 	        "The segments of the target subject make no tree with joints."},

@@ -20,6 +20,8 @@ inline constexpr const char* c_NotOpened = "'%1' cannot be opened. The target su
 inline constexpr const char* c_LaterVersion =
     "'%1' was written by a later version, which this one cannot read. The target subject is still the one before.";
 inline constexpr const char* c_NotRead = "'%1' could not be loaded. The target subject is still the one before.";
+inline constexpr const char* c_LegacyOnlyRead =
+    "Nothing was saved: '%1' is a legacy file, and those are only read. Choose a name that ends in .qrr.";
 inline constexpr const char* c_NotSaved = "Nothing was saved: '%1' could not be written, and is as it was.";
 
 } // namespace RetargetSetup::Ignored

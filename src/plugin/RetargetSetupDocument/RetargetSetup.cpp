@@ -79,6 +79,12 @@ void VRetargetSetup::SetTargetScale(double i_Scale)
 	SetTargetSubjectParametrised(std::move(subject));
 }
 
+void VRetargetSetup::SetNextTargetScale(double i_Scale)
+{
+	if (RetargetSetup::IsUsableScale(i_Scale))
+		m_TargetScale = i_Scale;
+}
+
 double VRetargetSetup::GetTargetScale() const
 {
 	const std::shared_ptr<const VSubjectParametrised> pSubject = TargetValues().m_pParametrised;

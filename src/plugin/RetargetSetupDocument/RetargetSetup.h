@@ -90,6 +90,10 @@ public:
 	/// Takes effect on the target subject at once. Anything but a finite number above 0 is refused, which is told.
 	void SetTargetScale(double i_Scale);
 
+	/// The scale of the next CreateTargetSubject, with no change of the target subject that is there. What
+	/// SetTargetScale refuses is ignored.
+	void SetNextTargetScale(double i_Scale);
+
 	/// The present target subject's; 1 without one.
 	double GetTargetScale() const;
 
@@ -134,6 +138,9 @@ public:
 
 	/// Stem of the source skeleton's file, or what the target subject's file tells of it.
 	const std::string& GetSourceName() const { return m_SourceName; }
+	/// Stem of the file that the present source subject is from, empty without one. It stays when a target subject's
+	/// file tells of another source.
+	const std::string& GetShownSourceName() const { return m_ShownSourceName; }
 	std::shared_ptr<VRetargetSetupSegmentModel> GetSourceSegmentModel() const { return m_pSourceSegmentModel; }
 	std::shared_ptr<VRetargetSetupSegmentModel> GetTargetSegmentModel() const { return m_pTargetSegmentModel; }
 	std::shared_ptr<VRetargetSetupTargetModel> GetTargetModel() const { return m_pTargetModel; }
@@ -202,6 +209,7 @@ private:
 	std::shared_ptr<const FBXIO::VSkinSkeleton> m_pFBXSkeleton;
 	std::string m_TargetName;
 	std::string m_SourceName;
+	std::string m_ShownSourceName;
 	VSubjectItems m_SourceItems;
 	VSubjectItems m_TargetItems;
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame;

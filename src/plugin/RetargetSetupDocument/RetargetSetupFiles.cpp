@@ -69,6 +69,17 @@ void TellNamesUsedTwice(const VSubjectParametrised& i_rSubject)
 			    name);
 }
 
+/// Whoever loads the file is shown the source that it names.
+void TellSourceOfSaved(const std::string& i_rNamed, const std::string& i_rShown)
+{
+	if (i_rNamed.empty())
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "The saved subject names no source skeleton: it was made before one was chosen");
+	else if (i_rNamed != i_rShown)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "The saved subject names source skeleton '%1%', and the one that is shown is '%2%'", i_rNamed, i_rShown);
+}
+
 /// Reads the file that is about to be written, in memory, and tells what would not come back.
 /// @return false if it could not be read at all, so that it must not replace a file that can.
 bool ReadsBack(const VSubjectRecord& i_rRecord, const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras)
@@ -183,7 +194,10 @@ bool VRetargetSetup::LoadSourceSubject(const boost::filesystem::path& i_rPath, c
 	std::string sourceName = std::exchange(m_SourceName, RetargetSetup::FileStem(i_rPath));
 	if (Replace(m_SourceItems, std::make_shared<const VSubjectParametrised>(std::move(subject)),
 	        std::make_shared<const VSubjectApplicationData>(std::move(applicationData))))
+	{
+		m_ShownSourceName = m_SourceName;
 		return true;
+	}
 	m_SourceName = std::move(sourceName);
 	return false;
 }
@@ -250,6 +264,10 @@ void VRetargetSetup::SaveTargetSubjectURL(const QUrl& i_rFileURL)
 	const boost::filesystem::path path = RetargetSetup::PathFromUrl(i_rFileURL);
 	if (path.empty())
 		return Ignore(c_Command, QString(Ignored::c_NotLocal).arg(i_rFileURL.toDisplayString()));
+	if (RetargetSetup::FileExtension(path) == c_LegacyExtension)
+		return Ignore(c_Command, QString(Ignored::c_LegacyOnlyRead).arg(i_rFileURL.toLocalFile()));
+	if (const auto pApplicationData = TargetValues().m_pApplicationData)
+		TellSourceOfSaved(pApplicationData->m_RetargetSourceTemplate, m_ShownSourceName);
 	switch (SaveTargetSubject(path))
 	{
 	case NVX::Status::c_Success: break;
