@@ -2,7 +2,6 @@
 
 #include "DebugServices/Assert.h"
 #include "DebugServices/GlobalLog.h"
-#include "math/NumberText.h"
 
 #include <gtest/gtest.h>
 
@@ -83,9 +82,7 @@ TEST(FindTransformBetweenPointsRobust, TellsItsScore)
 	const std::string words = "FindTransformBetweenPointsRobust Medsq ";
 	ASSERT_EQ(told.size(), 1u);
 	ASSERT_EQ(told[0].substr(0, words.size()), words);
-	double score = 1.0;
-	EXPECT_TRUE(NumberText::ScanWholeReal(told[0].substr(words.size()), score));
-	EXPECT_LT(score, 1e-25);
+	EXPECT_LT(std::stod(told[0].substr(words.size())), 1e-25);
 }
 
 TEST(FindTransformBetweenPointsRobust, MirroredPointsStillGiveARotation)

@@ -1,6 +1,7 @@
 #include "ComputeSubjectFK/BallJointPrior.h"
 
 #include "ComputeSubjectFK/ConstructionException.h"
+#include "ComputeSubjectFK/NearestRevolution.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "numerics/UnscentedTransform.h"
 #include "numerics/fnl_svd_fixed.h"
@@ -48,18 +49,6 @@ bool HasRange(const VSubject::VSegment& i_rSegment)
 	return i_rSegment.m_Joint.m_JointType == c_Ball && !i_rSegment.m_Joint.m_RangeMatrix.empty();
 }
 
-VMatrix3 MeanRotation(const VSubject::VSegment& i_rSegment)
-{
-	return Rotation::RotationMatrixFromAngleAxis(Fixed<3>(i_rSegment, i_rSegment.m_Joint.m_Mean));
-}
-
-/// The shortest rotation from one to the other, about the axes of the first.
-VVector3 TurnFrom(const VMatrix3& i_rFrom, const VVector3& i_rState)
-{
-	return Rotation::CanonicalAngleAxis(Rotation::AngleAxisFromRotationMatrix(
-	    Rotation::Product(Rotation::Transposed(i_rFrom), Rotation::RotationMatrixFromAngleAxis(i_rState))));
-}
-
 } // namespace
 
 VBallJointRange::VBallJointRange(const VSubject::VSegment& i_rSegment)
@@ -83,7 +72,10 @@ void VBallJointRange::Clone(std::unique_ptr<IComputeJointRange>& o_rpTarget) con
 
 VVector3 VBallJointRange::RangeState(const VVector3& i_rState) const
 {
-	return Rotation::Product(m_RangeMatrix, TurnFrom(m_Centre, i_rState));
+	const VMatrix3 fromCentre =
+	    Rotation::Product(Rotation::Transposed(m_Centre), Rotation::RotationMatrixFromAngleAxis(i_rState));
+	return Rotation::Product(
+	    m_RangeMatrix, Rotation::CanonicalAngleAxis(Rotation::AngleAxisFromRotationMatrix(fromCentre)));
 }
 
 VVector3 VBallJointRange::StateInRange(const VVector3& i_rRangeState) const
@@ -94,12 +86,13 @@ VVector3 VBallJointRange::StateInRange(const VVector3& i_rRangeState) const
 }
 
 VBallJointPrior::VBallJointPrior(const VSubject::VSegment& i_rSegment)
-    : VBallJointPrior(i_rSegment, Fixed<9>(i_rSegment, i_rSegment.m_Joint.m_Covariance))
+    : VBallJointPrior(i_rSegment.m_SegmentIndex, Fixed<3>(i_rSegment, i_rSegment.m_Joint.m_Mean),
+        Fixed<9>(i_rSegment, i_rSegment.m_Joint.m_Covariance))
 {
 }
 
-VBallJointPrior::VBallJointPrior(const VSubject::VSegment& i_rSegment, const VMatrix3& i_rCovariance)
-    : VComputeJointPriorForSegment(i_rSegment.m_SegmentIndex), m_Mean(MeanRotation(i_rSegment)),
+VBallJointPrior::VBallJointPrior(std::uint32_t i_SegmentIndex, const VVector3& i_rMean, const VMatrix3& i_rCovariance)
+    : VComputeJointPriorForSegment(i_SegmentIndex), m_Mean(i_rMean),
       m_InverseCovariance(fnl_svd_fixed<3, 3>(i_rCovariance).Inverse(c_SmallestSingularValue))
 {
 }
@@ -117,7 +110,9 @@ double VBallJointPrior::Energy() const
 
 void VBallJointPrior::SetState(const double*& io_rpState)
 {
-	m_Deviation = DeviationOf({io_rpState[0], io_rpState[1], io_rpState[2]});
+	const VVector3 state = PriorState({io_rpState[0], io_rpState[1], io_rpState[2]});
+	for (int i = 0; i < 3; ++i)
+		m_Deviation[i] = state[i] - m_Mean[i];
 	io_rpState += 3;
 }
 
@@ -126,35 +121,29 @@ std::unique_ptr<VComputeJointPriorInterfaceForSegment> VBallJointPrior::Clone() 
 	return std::make_unique<VBallJointPrior>(*this);
 }
 
-VVector3 VBallJointPrior::DeviationOf(const VVector3& i_rState) const
+VVector3 VBallJointPrior::PriorState(const VVector3& i_rState) const
 {
-	return TurnFrom(m_Mean, i_rState);
-}
-
-VVector3 VBallJointPriorRangeNormalised::VPriorToRangeSpace::operator()(const VVector3& i_rFromMean) const
-{
-	return m_rRange.RangeState(Rotation::AngleAxisFromRotationMatrix(
-	    Rotation::Product(m_Mean, Rotation::RotationMatrixFromAngleAxis(i_rFromMean))));
+	return NearestRevolution(i_rState, m_Mean);
 }
 
 VBallJointPriorRangeNormalised::VStatistics VBallJointPriorRangeNormalised::InRangeSpace(
     const VSubject::VSegment& i_rSegment, const VBallJointRange& i_rRange)
 {
 	VStatistics statistics;
-	UnscentedTransform(VPriorToRangeSpace{MeanRotation(i_rSegment), i_rRange}, VVector3{},
+	UnscentedTransform(VPriorToRangeSpace{i_rRange}, Fixed<3>(i_rSegment, i_rSegment.m_Joint.m_Mean),
 	    Fixed<9>(i_rSegment, i_rSegment.m_Joint.m_Covariance), statistics.m_Mean, statistics.m_Covariance);
 	return statistics;
 }
 
 VBallJointPriorRangeNormalised::VBallJointPriorRangeNormalised(const VSubject::VSegment& i_rSegment)
     : VBallJointPriorRangeNormalised(
-        i_rSegment, VBallJointRange(i_rSegment), InRangeSpace(i_rSegment, VBallJointRange(i_rSegment)))
+        i_rSegment.m_SegmentIndex, VBallJointRange(i_rSegment), InRangeSpace(i_rSegment, VBallJointRange(i_rSegment)))
 {
 }
 
 VBallJointPriorRangeNormalised::VBallJointPriorRangeNormalised(
-    const VSubject::VSegment& i_rSegment, const VBallJointRange& i_rRange, const VStatistics& i_rStatistics)
-    : VBallJointPrior(i_rSegment, i_rStatistics.m_Covariance), m_Range(i_rRange), m_RangeMean(i_rStatistics.m_Mean)
+    std::uint32_t i_SegmentIndex, const VBallJointRange& i_rRange, const VStatistics& i_rStatistics)
+    : VBallJointPrior(i_SegmentIndex, i_rStatistics.m_Mean, i_rStatistics.m_Covariance), m_Range(i_rRange)
 {
 }
 
@@ -163,10 +152,9 @@ std::unique_ptr<VComputeJointPriorInterfaceForSegment> VBallJointPriorRangeNorma
 	return std::make_unique<VBallJointPriorRangeNormalised>(*this);
 }
 
-VVector3 VBallJointPriorRangeNormalised::DeviationOf(const VVector3& i_rState) const
+VVector3 VBallJointPriorRangeNormalised::PriorState(const VVector3& i_rState) const
 {
-	const VVector3 state = m_Range.RangeState(i_rState);
-	return {state[0] - m_RangeMean[0], state[1] - m_RangeMean[1], state[2] - m_RangeMean[2]};
+	return m_Range.RangeState(i_rState);
 }
 
 std::unique_ptr<VComputeJointPriorInterfaceForSegment> CreateJointPrior(const VSubject::VSegment& i_rSegment)

@@ -34,8 +34,7 @@ private:
 	std::vector<Rotation::VMatrix3> m_NormalisedSpace;
 };
 
-/// The prior of a ball joint. What it measures is the rotation from the mean to the state as an angle-axis vector,
-/// about the joint's axes at the mean; the joint's covariance is of that vector.
+/// The prior of a ball joint over its angle-axis state.
 class VBallJointPrior : public VComputeJointPriorForSegment
 {
 public:
@@ -47,18 +46,18 @@ public:
 	void SetState(const double*& io_rpState) override;
 	std::unique_ptr<VComputeJointPriorInterfaceForSegment> Clone() const override;
 
-	virtual const Rotation::VMatrix3& Mean() const { return m_Mean; }
+	virtual const Rotation::VVector3& Mean() const { return m_Mean; }
 	virtual const Rotation::VMatrix3& InverseCovariance() const { return m_InverseCovariance; }
 
-	/// How far an angle-axis state is from the mean, in the space of the covariance.
-	virtual Rotation::VVector3 DeviationOf(const Rotation::VVector3& i_rState) const;
+	/// A state in the space of the mean: of its revolutions the nearest to the mean.
+	virtual Rotation::VVector3 PriorState(const Rotation::VVector3& i_rState) const;
 
 protected:
-	/// @param i_rCovariance in the space of the deviation.
-	VBallJointPrior(const CoreOrlexTypes::VSubject::VSegment& i_rSegment, const Rotation::VMatrix3& i_rCovariance);
+	VBallJointPrior(
+	    std::uint32_t i_SegmentIndex, const Rotation::VVector3& i_rMean, const Rotation::VMatrix3& i_rCovariance);
 
 private:
-	Rotation::VMatrix3 m_Mean;
+	Rotation::VVector3 m_Mean;
 	Rotation::VMatrix3 m_InverseCovariance;
 	Rotation::VVector3 m_Deviation{};
 };
@@ -70,15 +69,16 @@ public:
 	explicit VBallJointPriorRangeNormalised(const CoreOrlexTypes::VSubject::VSegment& i_rSegment);
 
 	std::unique_ptr<VComputeJointPriorInterfaceForSegment> Clone() const override;
-	Rotation::VVector3 DeviationOf(const Rotation::VVector3& i_rState) const override;
+	Rotation::VVector3 PriorState(const Rotation::VVector3& i_rState) const override;
 
 private:
-	/// Maps an angle-axis state that is measured from the mean into the range space.
+	/// Maps an angle-axis state into the range space.
 	struct VPriorToRangeSpace
 	{
-		Rotation::VVector3 operator()(const Rotation::VVector3& i_rFromMean) const;
-
-		Rotation::VMatrix3 m_Mean;
+		Rotation::VVector3 operator()(const Rotation::VVector3& i_rState) const
+		{
+			return m_rRange.RangeState(i_rState);
+		}
 		const VBallJointRange& m_rRange;
 	};
 	struct VStatistics
@@ -88,11 +88,10 @@ private:
 	};
 	static VStatistics InRangeSpace(
 	    const CoreOrlexTypes::VSubject::VSegment& i_rSegment, const VBallJointRange& i_rRange);
-	VBallJointPriorRangeNormalised(const CoreOrlexTypes::VSubject::VSegment& i_rSegment,
-	    const VBallJointRange& i_rRange, const VStatistics& i_rStatistics);
+	VBallJointPriorRangeNormalised(
+	    std::uint32_t i_SegmentIndex, const VBallJointRange& i_rRange, const VStatistics& i_rStatistics);
 
 	VBallJointRange m_Range;
-	Rotation::VVector3 m_RangeMean;
 };
 
 /// What is known about a segment's joint: a ball joint's own statistics where it has them, otherwise the default that

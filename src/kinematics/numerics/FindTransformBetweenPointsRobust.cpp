@@ -3,7 +3,6 @@
 #include "DebugServices/Assert.h"
 #include "DebugServices/GlobalLog.h"
 #include "math/NumberText.h"
-#include "numerics/AllFinite.h"
 #include "numerics/fnl_svd_fixed.h"
 
 #include <algorithm>
@@ -49,7 +48,7 @@ std::optional<VPose<double>> Fit(
 			for (int column = 0; column < 3; ++column)
 				correlation[3 * row + column] += d2[row] * d1[column];
 	}
-	if (!AllFinite(correlation))
+	if (!std::all_of(correlation.begin(), correlation.end(), [](double i_Value) { return std::isfinite(i_Value); }))
 		return {};
 	const fnl_svd_fixed<3, 3> svd(correlation);
 	if (!(svd.W()[1] > c_Flat * svd.W()[0]))

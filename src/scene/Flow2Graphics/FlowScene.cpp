@@ -1,0 +1,65 @@
+#include "Flow2Graphics/FlowScene.h"
+
+#include "OrlexGraphics/SelectionRegistry.h"
+
+namespace Flow2Graphics
+{
+
+VFlowScene::~VFlowScene() = default;
+
+void VFlowScene::SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame)
+{
+	m_pPendingFrame = std::move(i_pFrame);
+	RequestRefresh();
+}
+
+bool VFlowScene::Synchronise()
+{
+	if (m_pPendingFrame)
+		m_pFrame = std::move(m_pPendingFrame);
+	m_pPendingFrame.reset();
+	return VOrlexScene::Synchronise();
+}
+
+void VFlowScene::Refresh()
+{
+	Registry().Reset();
+	VOrlexScene::Refresh();
+}
+
+std::vector<QVector4D> VFlowScene::GetBounds(const std::vector<NVX::ISelectionItem>& i_rSelection) const
+{
+	std::vector<QVector4D> bounds;
+	for (const NVX::ISelectionItem& rItem : i_rSelection)
+		if (const auto found = Places().m_Bounds.find(rItem); found != Places().m_Bounds.end())
+			bounds.push_back(found->second);
+	return bounds;
+}
+
+bool VFlowScene::GetItemTransform(const std::vector<NVX::ISelectionItem>& i_rSelection, QMatrix4x4& o_rTransform) const
+{
+	for (const NVX::ISelectionItem& rItem : i_rSelection)
+		if (const auto found = Places().m_Matrices.find(rItem); found != Places().m_Matrices.end())
+		{
+			o_rTransform = found->second;
+			return true;
+		}
+	return false;
+}
+
+std::vector<NVX::ISelectionItem> VFlowScene::MakeSelection(
+    const std::vector<std::uint32_t>& i_rIds, std::vector<std::string>& o_rNames) const
+{
+	std::vector<NVX::ISelectionItem> items;
+	NVX::ISelectionItem item;
+	for (const std::uint32_t id : i_rIds)
+		if (Registry().ResolveId(id, item))
+		{
+			items.push_back(item);
+			if (const std::string& rName = Registry().GetName(id); !rName.empty())
+				o_rNames.push_back(rName);
+		}
+	return items;
+}
+
+} // namespace Flow2Graphics

@@ -1,0 +1,117 @@
+#include "OrlexGraphics/OrlexScene.h"
+#include "OrlexGraphics/SceneFramebufferRenderer.h"
+#include "OrlexGraphics/SelectionKinds.h"
+#include "OrlexGraphics/SelectionRegistry.h"
+
+#include <QColor>
+#include <QOpenGLFramebufferObject>
+#include <QOpenGLFunctions>
+
+#include <algorithm>
+
+// The id buffer picks: things are drawn with their ids for colours, into a framebuffer that nobody sees.
+
+namespace OrlexGraphics
+{
+
+namespace
+{
+
+/// Room for the largest item. Only the rectangle that is picked from is ever cleared, drawn and read.
+constexpr QSize c_PickSize(4096, 4096);
+
+/// Things that lie behind each other are found by drawing again without what was found.
+constexpr int c_MaxLayers = 16;
+constexpr double c_RectangleScale = 0.5;
+
+} // namespace
+
+void VSceneFramebufferRenderer::Pick(const QSize& i_rFrame)
+{
+	if (!m_pPickFramebuffer)
+		m_pPickFramebuffer = std::make_unique<QOpenGLFramebufferObject>(c_PickSize, QOpenGLFramebufferObject::Depth);
+	m_Context.m_Mode = CoreGraphics::ERenderPick;
+	m_Context.BindFramebuffer(m_pPickFramebuffer.get());
+	m_Context.SetClearColour(QColor(0, 0, 0, 0));
+
+	const auto devicePixel = [&](const QPoint& i_rPoint)
+	{ return QPoint(qRound(i_rPoint.x() * m_PixelRatio), qRound(i_rPoint.y() * m_PixelRatio)); };
+	const QPoint mouse = devicePixel(m_Request.m_Mouse);
+	m_PickedIds.clear();
+	if (m_Request.m_bRectangle)
+	{
+		const float diagonal = m_Context.m_Projection(0, 0) + m_Context.m_Projection(1, 1);
+		if (m_pScene->ExactPick())
+			PickRect(devicePixel(m_Request.m_Start), mouse,
+			    std::min(2.0 / std::max(static_cast<double>(diagonal), 1e-9), 1.0), 1, i_rFrame);
+		else
+			PickRect(devicePixel(m_Request.m_Start), mouse, c_RectangleScale, c_MaxLayers, i_rFrame);
+	}
+	else if (const std::uint32_t id = PickPoint(mouse, i_rFrame))
+		m_PickedIds.push_back(id);
+	m_Context.ResetScissor();
+	m_Pick.m_Request = m_Request;
+	m_Pick.m_Request.m_Frame = m_Frame;
+	m_Pick.m_Names.clear();
+	m_Pick.m_Items = m_pScene->MakeSelection(m_PickedIds, m_Pick.m_Names);
+	if (m_Request.m_bRectangle)
+		std::erase_if(m_Pick.m_Items,
+		    [](const NVX::ISelectionItem& i_rItem) { return i_rItem.m_Kind == ESelectionManipulatorHandle; });
+	m_bPicked = true;
+}
+
+void VSceneFramebufferRenderer::ReadIds(const QRect& i_rRectangle)
+{
+	QOpenGLFunctions& rGL = *m_Context.m_pFunctions;
+	rGL.glEnable(GL_SCISSOR_TEST);
+	rGL.glScissor(i_rRectangle.x(), i_rRectangle.y(), i_rRectangle.width(), i_rRectangle.height());
+	m_Context.ClearBuffers(true, true);
+	if (!m_Options.m_bCameraView)
+		RenderPasses();
+	m_Context.ReadPixels(i_rRectangle, m_Pixels);
+}
+
+std::uint32_t VSceneFramebufferRenderer::PickPoint(const QPoint& i_rMouse, const QSize& i_rFrame)
+{
+	const QRect rectangle = PointPickRectangle(i_rMouse, i_rFrame.height(), m_pPickFramebuffer->size());
+	if (rectangle.isEmpty())
+		return 0;
+	VSelectionRegistry& rRegistry = m_pScene->Registry();
+	rRegistry.ClearExcluded();
+	rRegistry.ExcludeOutside(MakePickFrustum(m_Context.m_Projection * m_Context.m_View, rectangle, i_rFrame));
+	ReadIds(rectangle);
+	return NearestId(m_Pixels.data(), rectangle.size(),
+	    QPoint(i_rMouse.x(), i_rFrame.height() - 1 - i_rMouse.y()) - rectangle.topLeft());
+}
+
+void VSceneFramebufferRenderer::PickRect(
+    const QPoint& i_rA, const QPoint& i_rB, double i_Scale, int i_MaxPasses, const QSize& i_rFrame)
+{
+	const QSize scaled(qRound(i_rFrame.width() * i_Scale), qRound(i_rFrame.height() * i_Scale));
+	const QRect rectangle =
+	    RectanglePickRectangle(i_rA, i_rB, i_Scale, i_rFrame) & QRect(QPoint(), m_pPickFramebuffer->size());
+	if (rectangle.isEmpty())
+		return;
+	const QRect viewport = m_Context.m_Viewport;
+	const QSize frameSize = m_Context.m_FrameSize;
+	m_Context.SetViewport(QRect(QPoint(), scaled));
+	m_Context.m_FrameSize = scaled;
+
+	VSelectionRegistry& rRegistry = m_pScene->Registry();
+	rRegistry.ClearExcluded();
+	rRegistry.ExcludeOutside(MakePickFrustum(m_Context.m_Projection * m_Context.m_View, rectangle, scaled));
+	m_Found.clear();
+	for (int i = 0; i < i_MaxPasses; ++i)
+	{
+		const std::size_t before = m_PickedIds.size();
+		ReadIds(rectangle);
+		if (!CollectIds(m_Pixels.data(), m_Pixels.size() / 4, m_Found, m_PickedIds))
+			break;
+		std::for_each(m_PickedIds.begin() + static_cast<std::ptrdiff_t>(before), m_PickedIds.end(),
+		    [&](std::uint32_t i_Id) { rRegistry.Exclude(i_Id); });
+	}
+	m_Context.SetViewport(viewport);
+	m_Context.m_FrameSize = frameSize;
+}
+
+} // namespace OrlexGraphics

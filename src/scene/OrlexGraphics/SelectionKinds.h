@@ -1,0 +1,27 @@
+#pragma once
+
+#include <cstdint>
+
+namespace OrlexGraphics
+{
+
+/// Kinds of NVX::ISelectionItem that the scene itself knows, beside those of the panel's lists.
+enum ESceneSelectionKind : std::uint32_t
+{
+	/// By device URN.
+	ESelectionCamera = 1,
+	ESelectionSubject = 7,
+	/// Stays when the selection is replaced in camera view.
+	ESelectionKeptInCameraView = 27,
+	/// Group and axis of a handle of the manipulator.
+	ESelectionManipulatorHandle = 28,
+	ESelectionVolumeManipulatorHandle = 34
+};
+
+/// Whether items of a kind take one id for each of their children, whose number the picked item carries.
+constexpr bool HasChildren(std::uint32_t i_Kind)
+{
+	return i_Kind == 2 || i_Kind == 3 || i_Kind == 5 || i_Kind == 31;
+}
+
+} // namespace OrlexGraphics
