@@ -1,5 +1,6 @@
 #include "MessageLog.h"
 
+#include "ComputeSubjectFK/BallJointPrior.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypesUtils/EulerToAngleAxis.h"
 #include "CoreOrlexTypesUtils/JointRange.h"
@@ -113,6 +114,28 @@ TEST(RestPose, BallCovarianceAgreesWithSamples)
 	}
 	for (std::size_t i = 0; i < 9; ++i)
 		EXPECT_NEAR(covariance[i], sums[i], 0.01 * std::sqrt(sums[i / 3 * 4] * sums[i % 3 * 4])) << i;
+}
+
+/// What a solver makes of it: one angle that is off by its deviation costs one half.
+TEST(RestPose, APriorMeasuresInTheSameAxes)
+{
+	const VEulerToAABall::VState restPose{0.5, -0.8, 1.1};
+	const VNumbers stiffness{60, 70, 80};
+	CoreOrlexTypes::VSubject::VSegment segment;
+	segment.m_Joint.m_JointType = VJoint::EBall;
+	ASSERT_TRUE(RestPoseStiffnessToMeanCovariance(VJoint::EBall, {restPose.begin(), restPose.end()}, stiffness,
+	    segment.m_Joint.m_Mean, segment.m_Joint.m_Covariance));
+	ComputeSubject::VBallJointPrior prior(segment);
+	for (std::size_t i = 0; i < 3; ++i)
+	{
+		Rotation::VVector3 angles = restPose;
+		angles[i] += std::exp(3.912023005428146 - 10.819778284410283 * stiffness[i] * 0.01);
+		const Rotation::VVector3 state =
+		    Rotation::AngleAxisFromRotationMatrix(Rotation::RotationMatrixFromEuler(angles, Rotation::EXYZ));
+		const double* pState = state.data();
+		prior.SetState(pState);
+		EXPECT_NEAR(prior.Energy(), 0.5, 1e-9) << i;
+	}
 }
 
 TEST(RestPose, GimbalLockKeepsTheMiddleAngle)

@@ -2,6 +2,7 @@
 
 #include "DebugServices/Assert.h"
 #include "DebugServices/GlobalLog.h"
+#include "math/NumberText.h"
 
 #include <gtest/gtest.h>
 
@@ -82,7 +83,9 @@ TEST(FindTransformBetweenPointsRobust, TellsItsScore)
 	const std::string words = "FindTransformBetweenPointsRobust Medsq ";
 	ASSERT_EQ(told.size(), 1u);
 	ASSERT_EQ(told[0].substr(0, words.size()), words);
-	EXPECT_LT(std::stod(told[0].substr(words.size())), 1e-25);
+	double score = 1.0;
+	EXPECT_TRUE(NumberText::ScanWholeReal(told[0].substr(words.size()), score));
+	EXPECT_LT(score, 1e-25);
 }
 
 TEST(FindTransformBetweenPointsRobust, MirroredPointsStillGiveARotation)

@@ -1,7 +1,6 @@
 #include "ComputeSubjectFK/BallJointPrior.h"
 
 #include "ComputeSubjectFK/ConstructionException.h"
-#include "ComputeSubjectFK/NearestRevolution.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "numerics/UnscentedTransform.h"
 #include "numerics/fnl_svd_fixed.h"
@@ -49,6 +48,18 @@ bool HasRange(const VSubject::VSegment& i_rSegment)
 	return i_rSegment.m_Joint.m_JointType == c_Ball && !i_rSegment.m_Joint.m_RangeMatrix.empty();
 }
 
+VMatrix3 MeanRotation(const VSubject::VSegment& i_rSegment)
+{
+	return Rotation::RotationMatrixFromAngleAxis(Fixed<3>(i_rSegment, i_rSegment.m_Joint.m_Mean));
+}
+
+/// The shortest rotation from one to the other, about the axes of the first.
+VVector3 TurnFrom(const VMatrix3& i_rFrom, const VVector3& i_rState)
+{
+	return Rotation::CanonicalAngleAxis(Rotation::AngleAxisFromRotationMatrix(
+	    Rotation::Product(Rotation::Transposed(i_rFrom), Rotation::RotationMatrixFromAngleAxis(i_rState))));
+}
+
 } // namespace
 
 VBallJointRange::VBallJointRange(const VSubject::VSegment& i_rSegment)
@@ -72,10 +83,7 @@ void VBallJointRange::Clone(std::unique_ptr<IComputeJointRange>& o_rpTarget) con
 
 VVector3 VBallJointRange::RangeState(const VVector3& i_rState) const
 {
-	const VMatrix3 fromCentre =
-	    Rotation::Product(Rotation::Transposed(m_Centre), Rotation::RotationMatrixFromAngleAxis(i_rState));
-	return Rotation::Product(
-	    m_RangeMatrix, Rotation::CanonicalAngleAxis(Rotation::AngleAxisFromRotationMatrix(fromCentre)));
+	return Rotation::Product(m_RangeMatrix, TurnFrom(m_Centre, i_rState));
 }
 
 VVector3 VBallJointRange::StateInRange(const VVector3& i_rRangeState) const
@@ -86,13 +94,12 @@ VVector3 VBallJointRange::StateInRange(const VVector3& i_rRangeState) const
 }
 
 VBallJointPrior::VBallJointPrior(const VSubject::VSegment& i_rSegment)
-    : VBallJointPrior(i_rSegment.m_SegmentIndex, Fixed<3>(i_rSegment, i_rSegment.m_Joint.m_Mean),
-        Fixed<9>(i_rSegment, i_rSegment.m_Joint.m_Covariance))
+    : VBallJointPrior(i_rSegment, Fixed<9>(i_rSegment, i_rSegment.m_Joint.m_Covariance))
 {
 }
 
-VBallJointPrior::VBallJointPrior(std::uint32_t i_SegmentIndex, const VVector3& i_rMean, const VMatrix3& i_rCovariance)
-    : VComputeJointPriorForSegment(i_SegmentIndex), m_Mean(i_rMean),
+VBallJointPrior::VBallJointPrior(const VSubject::VSegment& i_rSegment, const VMatrix3& i_rCovariance)
+    : VComputeJointPriorForSegment(i_rSegment.m_SegmentIndex), m_Mean(MeanRotation(i_rSegment)),
       m_InverseCovariance(fnl_svd_fixed<3, 3>(i_rCovariance).Inverse(c_SmallestSingularValue))
 {
 }
@@ -110,9 +117,7 @@ double VBallJointPrior::Energy() const
 
 void VBallJointPrior::SetState(const double*& io_rpState)
 {
-	const VVector3 state = PriorState({io_rpState[0], io_rpState[1], io_rpState[2]});
-	for (int i = 0; i < 3; ++i)
-		m_Deviation[i] = state[i] - m_Mean[i];
+	m_Deviation = DeviationOf({io_rpState[0], io_rpState[1], io_rpState[2]});
 	io_rpState += 3;
 }
 
@@ -121,29 +126,35 @@ std::unique_ptr<VComputeJointPriorInterfaceForSegment> VBallJointPrior::Clone() 
 	return std::make_unique<VBallJointPrior>(*this);
 }
 
-VVector3 VBallJointPrior::PriorState(const VVector3& i_rState) const
+VVector3 VBallJointPrior::DeviationOf(const VVector3& i_rState) const
 {
-	return NearestRevolution(i_rState, m_Mean);
+	return TurnFrom(m_Mean, i_rState);
+}
+
+VVector3 VBallJointPriorRangeNormalised::VPriorToRangeSpace::operator()(const VVector3& i_rFromMean) const
+{
+	return m_rRange.RangeState(Rotation::AngleAxisFromRotationMatrix(
+	    Rotation::Product(m_Mean, Rotation::RotationMatrixFromAngleAxis(i_rFromMean))));
 }
 
 VBallJointPriorRangeNormalised::VStatistics VBallJointPriorRangeNormalised::InRangeSpace(
     const VSubject::VSegment& i_rSegment, const VBallJointRange& i_rRange)
 {
 	VStatistics statistics;
-	UnscentedTransform(VPriorToRangeSpace{i_rRange}, Fixed<3>(i_rSegment, i_rSegment.m_Joint.m_Mean),
+	UnscentedTransform(VPriorToRangeSpace{MeanRotation(i_rSegment), i_rRange}, VVector3{},
 	    Fixed<9>(i_rSegment, i_rSegment.m_Joint.m_Covariance), statistics.m_Mean, statistics.m_Covariance);
 	return statistics;
 }
 
 VBallJointPriorRangeNormalised::VBallJointPriorRangeNormalised(const VSubject::VSegment& i_rSegment)
     : VBallJointPriorRangeNormalised(
-        i_rSegment.m_SegmentIndex, VBallJointRange(i_rSegment), InRangeSpace(i_rSegment, VBallJointRange(i_rSegment)))
+        i_rSegment, VBallJointRange(i_rSegment), InRangeSpace(i_rSegment, VBallJointRange(i_rSegment)))
 {
 }
 
 VBallJointPriorRangeNormalised::VBallJointPriorRangeNormalised(
-    std::uint32_t i_SegmentIndex, const VBallJointRange& i_rRange, const VStatistics& i_rStatistics)
-    : VBallJointPrior(i_SegmentIndex, i_rStatistics.m_Mean, i_rStatistics.m_Covariance), m_Range(i_rRange)
+    const VSubject::VSegment& i_rSegment, const VBallJointRange& i_rRange, const VStatistics& i_rStatistics)
+    : VBallJointPrior(i_rSegment, i_rStatistics.m_Covariance), m_Range(i_rRange), m_RangeMean(i_rStatistics.m_Mean)
 {
 }
 
@@ -152,9 +163,10 @@ std::unique_ptr<VComputeJointPriorInterfaceForSegment> VBallJointPriorRangeNorma
 	return std::make_unique<VBallJointPriorRangeNormalised>(*this);
 }
 
-VVector3 VBallJointPriorRangeNormalised::PriorState(const VVector3& i_rState) const
+VVector3 VBallJointPriorRangeNormalised::DeviationOf(const VVector3& i_rState) const
 {
-	return m_Range.RangeState(i_rState);
+	const VVector3 state = m_Range.RangeState(i_rState);
+	return {state[0] - m_RangeMean[0], state[1] - m_RangeMean[1], state[2] - m_RangeMean[2]};
 }
 
 std::unique_ptr<VComputeJointPriorInterfaceForSegment> CreateJointPrior(const VSubject::VSegment& i_rSegment)

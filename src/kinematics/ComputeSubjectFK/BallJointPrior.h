@@ -34,7 +34,8 @@ private:
 	std::vector<Rotation::VMatrix3> m_NormalisedSpace;
 };
 
-/// The prior of a ball joint over its angle-axis state.
+/// The prior of a ball joint. What it measures is the rotation from the mean to the state as an angle-axis vector,
+/// about the joint's axes at the mean; the joint's covariance is of that vector.
 class VBallJointPrior : public VComputeJointPriorForSegment
 {
 public:
@@ -46,18 +47,18 @@ public:
 	void SetState(const double*& io_rpState) override;
 	std::unique_ptr<VComputeJointPriorInterfaceForSegment> Clone() const override;
 
-	virtual const Rotation::VVector3& Mean() const { return m_Mean; }
+	virtual const Rotation::VMatrix3& Mean() const { return m_Mean; }
 	virtual const Rotation::VMatrix3& InverseCovariance() const { return m_InverseCovariance; }
 
-	/// A state in the space of the mean: of its revolutions the nearest to the mean.
-	virtual Rotation::VVector3 PriorState(const Rotation::VVector3& i_rState) const;
+	/// How far an angle-axis state is from the mean, in the space of the covariance.
+	virtual Rotation::VVector3 DeviationOf(const Rotation::VVector3& i_rState) const;
 
 protected:
-	VBallJointPrior(
-	    std::uint32_t i_SegmentIndex, const Rotation::VVector3& i_rMean, const Rotation::VMatrix3& i_rCovariance);
+	/// @param i_rCovariance in the space of the deviation.
+	VBallJointPrior(const CoreOrlexTypes::VSubject::VSegment& i_rSegment, const Rotation::VMatrix3& i_rCovariance);
 
 private:
-	Rotation::VVector3 m_Mean;
+	Rotation::VMatrix3 m_Mean;
 	Rotation::VMatrix3 m_InverseCovariance;
 	Rotation::VVector3 m_Deviation{};
 };
@@ -69,16 +70,15 @@ public:
 	explicit VBallJointPriorRangeNormalised(const CoreOrlexTypes::VSubject::VSegment& i_rSegment);
 
 	std::unique_ptr<VComputeJointPriorInterfaceForSegment> Clone() const override;
-	Rotation::VVector3 PriorState(const Rotation::VVector3& i_rState) const override;
+	Rotation::VVector3 DeviationOf(const Rotation::VVector3& i_rState) const override;
 
 private:
-	/// Maps an angle-axis state into the range space.
+	/// Maps an angle-axis state that is measured from the mean into the range space.
 	struct VPriorToRangeSpace
 	{
-		Rotation::VVector3 operator()(const Rotation::VVector3& i_rState) const
-		{
-			return m_rRange.RangeState(i_rState);
-		}
+		Rotation::VVector3 operator()(const Rotation::VVector3& i_rFromMean) const;
+
+		Rotation::VMatrix3 m_Mean;
 		const VBallJointRange& m_rRange;
 	};
 	struct VStatistics
@@ -88,10 +88,11 @@ private:
 	};
 	static VStatistics InRangeSpace(
 	    const CoreOrlexTypes::VSubject::VSegment& i_rSegment, const VBallJointRange& i_rRange);
-	VBallJointPriorRangeNormalised(
-	    std::uint32_t i_SegmentIndex, const VBallJointRange& i_rRange, const VStatistics& i_rStatistics);
+	VBallJointPriorRangeNormalised(const CoreOrlexTypes::VSubject::VSegment& i_rSegment,
+	    const VBallJointRange& i_rRange, const VStatistics& i_rStatistics);
 
 	VBallJointRange m_Range;
+	Rotation::VVector3 m_RangeMean;
 };
 
 /// What is known about a segment's joint: a ball joint's own statistics where it has them, otherwise the default that

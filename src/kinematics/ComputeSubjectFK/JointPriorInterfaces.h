@@ -16,7 +16,7 @@ public:
 	virtual ~IComputeJointPrior() = default;
 	virtual std::size_t NumberOfStates() const = 0;
 
-	/// The state that was set last less the mean, in the space of the prior.
+	/// From the mean to the state that was set last, in the space of the prior.
 	virtual void Deviation(std::span<double> o_Deviation) const = 0;
 
 	/// Half the squared Mahalanobis distance of the state that was set last; 0 at the mean.

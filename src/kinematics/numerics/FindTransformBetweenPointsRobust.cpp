@@ -3,6 +3,7 @@
 #include "DebugServices/Assert.h"
 #include "DebugServices/GlobalLog.h"
 #include "math/NumberText.h"
+#include "numerics/AllFinite.h"
 #include "numerics/fnl_svd_fixed.h"
 
 #include <algorithm>
@@ -48,7 +49,7 @@ std::optional<VPose<double>> Fit(
 			for (int column = 0; column < 3; ++column)
 				correlation[3 * row + column] += d2[row] * d1[column];
 	}
-	if (!std::all_of(correlation.begin(), correlation.end(), [](double i_Value) { return std::isfinite(i_Value); }))
+	if (!AllFinite(correlation))
 		return {};
 	const fnl_svd_fixed<3, 3> svd(correlation);
 	if (!(svd.W()[1] > c_Flat * svd.W()[0]))

@@ -1,26 +1,15 @@
 #include "numerics/Lapack.h"
 
-#include <lapacke.h>
+#include "numerics/AllFinite.h"
 
-#include <algorithm>
-#include <cmath>
+#include <lapacke.h>
 
 namespace Lapack
 {
-namespace
-{
-
-bool AllFinite(const double* i_pFirst, int i_Count)
-{
-	return std::all_of(i_pFirst, i_pFirst + i_Count, [](double i_Value) { return std::isfinite(i_Value); });
-}
-
-} // namespace
-
 int Dgesvd(int i_Rows, int i_Columns, double* io_pM, double* o_pW, double* o_pU, double* o_pVt, double* o_pWork,
     int i_WorkSize)
 {
-	if (!AllFinite(io_pM, i_Rows * i_Columns))
+	if (!AllFinite({io_pM, std::size_t(i_Rows * i_Columns)}))
 		return -6;
 	// Row by row, the matrix is its transpose column by column, and the two factors change places.
 	const int smaller = std::min(i_Rows, i_Columns);
@@ -32,7 +21,7 @@ int Dgesvd(int i_Rows, int i_Columns, double* io_pM, double* o_pW, double* o_pU,
 
 int Dsyev(int i_Size, double* io_pMatrix, double* o_pValues, double* o_pWork, int i_WorkSize)
 {
-	if (!AllFinite(io_pMatrix, i_Size * i_Size))
+	if (!AllFinite({io_pMatrix, std::size_t(i_Size * i_Size)}))
 		return -5;
 	return LAPACKE_dsyev_work(
 	    LAPACK_COL_MAJOR, 'V', 'L', i_Size, io_pMatrix, std::max(i_Size, 1), o_pValues, o_pWork, i_WorkSize);
@@ -40,7 +29,7 @@ int Dsyev(int i_Size, double* io_pMatrix, double* o_pValues, double* o_pWork, in
 
 int Dsyevd(int i_Size, double* io_pMatrix, double* o_pValues)
 {
-	if (!AllFinite(io_pMatrix, i_Size * i_Size))
+	if (!AllFinite({io_pMatrix, std::size_t(i_Size * i_Size)}))
 		return -5;
 	return LAPACKE_dsyevd(LAPACK_COL_MAJOR, 'V', 'L', i_Size, io_pMatrix, std::max(i_Size, 1), o_pValues);
 }

@@ -1,5 +1,6 @@
 #include "numerics/MatrixValidity.h"
 
+#include "numerics/AllFinite.h"
 #include "numerics/fnl_symmetric_eigensystem.h"
 
 #include <algorithm>
@@ -18,7 +19,7 @@ bool IsZero(std::span<const double> i_Matrix)
 /// What must hold before the eigenvalues are asked for.
 EFault FaultOfEntries(std::span<const double> i_Matrix, std::size_t i_Size)
 {
-	if (!std::ranges::all_of(i_Matrix, [](double i_Value) { return std::isfinite(i_Value); }))
+	if (!AllFinite(i_Matrix))
 		return EFault::ENotFinite;
 	for (std::size_t row = 0; row < i_Size; ++row)
 		for (std::size_t column = 0; column < row; ++column)

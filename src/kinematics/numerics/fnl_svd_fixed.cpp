@@ -1,18 +1,15 @@
 #include "numerics/fnl_svd_fixed.h"
 
 #include "math/NumberText.h"
+#include "numerics/AllFinite.h"
 
-#include <algorithm>
-#include <cmath>
 #include <iostream>
 
 void fnl_svd_report(int i_Info, const double* i_pM, std::size_t i_Rows, std::size_t i_Columns)
 {
 	std::string text =
 	    std::string(__FILE__ ": ") + "suspicious return value (" + std::to_string(i_Info) + ") from SVDC\n";
-	const bool bBad =
-	    !std::all_of(i_pM, i_pM + i_Rows * i_Columns, [](double i_Value) { return std::isfinite(i_Value); });
-	if (bBad)
+	if (!AllFinite({i_pM, i_Rows * i_Columns}))
 	{
 		text += std::string(__FILE__ ": ") + "M is " + std::to_string(i_Rows) + "x" + std::to_string(i_Columns)
 		    + "\nM = [ ...\n";

@@ -5,6 +5,12 @@
 namespace CoreOrlexTypes
 {
 
+/// False for EBadJointType and any value outside the enumeration.
+constexpr bool IsJointType(VSubjectParametrised::VJoint::EJointType i_Type)
+{
+	return i_Type >= VSubjectParametrised::VJoint::EFree && i_Type <= VSubjectParametrised::VJoint::EDummy;
+}
+
 /// Degrees of freedom of a joint type, the size of its state vectors; 0 for any value outside the enumeration.
 constexpr std::size_t StateSize(VSubjectParametrised::VJoint::EJointType i_Type)
 {

@@ -5,6 +5,7 @@
 #include "CoreOrlexTypesUtils/Expectation.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "numerics/AllFinite.h"
 #include "numerics/fnl_symmetric_eigensystem.h"
 
 #include <algorithm>
@@ -127,22 +128,14 @@ std::array<double, 2> EllipseExtents(const VNumbers& i_rEllipseMat)
 	return {std::sqrt(std::max(i_rEllipseMat[0], 0.0)), std::sqrt(std::max(i_rEllipseMat[3], 0.0))};
 }
 
-bool IsKnown(VJoint::EJointType i_JointType)
+bool Refuse(const char* i_pMessage)
 {
-	if (i_JointType >= VJoint::EFree && i_JointType <= VJoint::EDummy)
-		return true;
-	NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert ranges: unsupported joint type");
+	NVX_LOG("SubjectUtils", NVX::ELogError, i_pMessage);
 	return false;
 }
 
-bool AreFinite(const VNumbers& i_rA, const VNumbers& i_rB)
-{
-	const auto finite = [](double i_Value) { return std::isfinite(i_Value); };
-	if (std::all_of(i_rA.begin(), i_rA.end(), finite) && std::all_of(i_rB.begin(), i_rB.end(), finite))
-		return true;
-	NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert ranges: a value is not finite");
-	return false;
-}
+constexpr const char* c_pUnknownType = "Cannot convert ranges: unsupported joint type";
+constexpr const char* c_pNotFinite = "Cannot convert ranges: a value is not finite";
 
 } // namespace
 
@@ -152,12 +145,14 @@ bool RangeToMinMax(VJoint::EJointType i_JointType, const VNumbers& i_rRangeCente
 	const std::size_t DoF = CoreOrlexTypes::StateSize(i_JointType);
 	bool bFits = Expect(DoF == i_rRangeCenteringState.size(), "DoF == i_rRangeCenteringState.size()");
 	bFits &= Expect((DoF * DoF) == i_rRangeMatrix.size(), "( DoF*DoF ) == i_rRangeMatrix.size()");
-	if (!IsKnown(i_JointType))
-		return false;
+	if (!CoreOrlexTypes::IsJointType(i_JointType))
+		return Refuse(c_pUnknownType);
 	const std::array<double, 2> ellipse =
 	    i_JointType == VJoint::EHardySpicer ? EllipseExtents(i_rRangeMatrix) : std::array<double, 2>{};
-	if (!bFits || !AreFinite(i_rRangeCenteringState, i_rRangeMatrix))
+	if (!bFits)
 		return false;
+	if (!AllFinite(i_rRangeCenteringState) || !AllFinite(i_rRangeMatrix))
+		return Refuse(c_pNotFinite);
 
 	o_rMin.assign(DoF, 0.0);
 	o_rMax.assign(DoF, 0.0);
@@ -176,7 +171,7 @@ bool RangeToMinMax(VJoint::EJointType i_JointType, const VNumbers& i_rRangeCente
 			o_rMax[i] = i_rRangeCenteringState[i] + extents[i];
 		}
 	}
-	return AreFinite(o_rMin, o_rMax);
+	return (AllFinite(o_rMin) && AllFinite(o_rMax)) || Refuse(c_pNotFinite);
 }
 
 bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const VNumbers& i_rMax,
@@ -199,8 +194,12 @@ bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const
 		    "SubjectUtils", NVX::ELogError, "Range conversion from MinMax to axis angle not supported on a free joint");
 		return false;
 	}
-	if (!IsKnown(i_JointType) || !bFits || !AreFinite(i_rMin, i_rMax))
+	if (!CoreOrlexTypes::IsJointType(i_JointType))
+		return Refuse(c_pUnknownType);
+	if (!bFits)
 		return false;
+	if (!AllFinite(i_rMin) || !AllFinite(i_rMax))
+		return Refuse(c_pNotFinite);
 
 	o_rRangeCenteringState.assign(DoFCount, 0.0);
 	o_rRangeMatrix.assign(DoFCount * DoFCount, 0.0);
@@ -210,7 +209,7 @@ bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const
 		o_rRangeCenteringState[i] = i_rMin[i] + d * 0.5;
 		o_rRangeMatrix[i * (DoFCount + 1)] = d * d * 0.25;
 	}
-	return AreFinite(o_rRangeCenteringState, o_rRangeMatrix);
+	return (AllFinite(o_rRangeCenteringState) && AllFinite(o_rRangeMatrix)) || Refuse(c_pNotFinite);
 }
 
 } // namespace CoreOrlexTypesUtils::TemplateSubjectUtils

@@ -5,6 +5,7 @@
 #include "CoreOrlexTypesUtils/Expectation.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "numerics/AllFinite.h"
 #include "numerics/UnscentedTransform.h"
 #include "numerics/fnl_svd_fixed.h"
 
@@ -42,11 +43,6 @@ double VarianceOf(const VStiffnessRule& i_rRule, double i_Stiffness)
 	const double deviation =
 	    std::exp(i_rRule.Upper - (i_rRule.Upper - i_rRule.Lower) * std::clamp(i_Stiffness, 0.0, 100.0) * 0.01);
 	return deviation * deviation;
-}
-
-bool AllFinite(const VNumbers& i_rValues)
-{
-	return std::all_of(i_rValues.begin(), i_rValues.end(), [](double i_Value) { return std::isfinite(i_Value); });
 }
 
 bool TellNotFinite()
@@ -175,7 +171,7 @@ bool MeanCovarianceToRestPoseStiffness(VJoint::EJointType i_JointType, const VNu
 	const std::size_t Dof = CoreOrlexTypes::StateSize(i_JointType);
 	bool bFits = Expect(Dof == i_rMeanPose.size(), "Dof == i_rMeanPose.size()");
 	bFits &= Expect((Dof * Dof) == i_rCovariance.size(), "( Dof*Dof ) == i_rCovariance.size()");
-	if (i_JointType < VJoint::EFree || i_JointType > VJoint::EDummy)
+	if (!CoreOrlexTypes::IsJointType(i_JointType))
 	{
 		NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert statistics: unsupported joint type");
 		return false;
@@ -204,7 +200,7 @@ bool RestPoseStiffnessToMeanCovariance(VJoint::EJointType i_JointType, const VNu
 	const std::size_t DoF = CoreOrlexTypes::StateSize(i_JointType);
 	bool bFits = Expect(i_rRestPose.size() == DoF, "i_rRestPose.size() == DoF");
 	bFits &= Expect(i_rStiffness.size() == DoF, "i_rStiffness.size() == DoF");
-	if (i_JointType < VJoint::EFree || i_JointType > VJoint::EDummy)
+	if (!CoreOrlexTypes::IsJointType(i_JointType))
 	{
 		NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert stats: unsupported joint type");
 		return false;
