@@ -7,7 +7,7 @@ namespace
 
 const char* const c_Roles[] = {"name", "display", "description", "category", "value", "valueText", "hasValue",
     "defaultText", "presentationHint", "fileAccess", "fileFilter", "hidden", "advanced", "minimum", "maximum",
-    "enumNames", "enumTexts", "currentEnumIndex", "type"};
+    "enumerated", "enumNames", "enumTexts", "currentEnumIndex", "type"};
 
 QVariant ValueOf(const VFakeParameter& i_rParameter, const QString& i_rText)
 {
@@ -48,11 +48,12 @@ QVariant VFakeParameterModel::data(const QModelIndex& i_rIndex, int i_Role) cons
 	{ return i_rNumber ? QVariant(*i_rNumber) : QVariant(); };
 	const QHash<QByteArray, QVariant> values = {{"name", rParameter.m_Name}, {"display", rParameter.m_Name},
 	    {"description", rParameter.m_Description}, {"category", rParameter.m_Category},
-	    {"value", ValueOf(rParameter, text)}, {"valueText", text}, {"hasValue", rParameter.m_Value.has_value()},
+	    {"value", ValueOf(rParameter, text)}, {"valueText", text}, {"hasValue", !text.isEmpty()},
 	    {"defaultText", rParameter.m_Default}, {"presentationHint", rParameter.m_PresentationHint},
 	    {"fileAccess", rParameter.m_FileAccess}, {"fileFilter", rParameter.m_FileFilter},
 	    {"hidden", rParameter.m_bHidden}, {"advanced", rParameter.m_bAdvanced},
 	    {"minimum", number(rParameter.m_Minimum)}, {"maximum", number(rParameter.m_Maximum)},
+	    {"enumerated", rParameter.m_bEnumerated || !rParameter.m_EnumNames.isEmpty()},
 	    {"enumNames", rParameter.m_EnumNames}, {"enumTexts", rParameter.m_EnumNames},
 	    {"currentEnumIndex", rParameter.m_EnumNames.indexOf(text)}, {"type", rParameter.m_Type}};
 	return values.value(role);
@@ -96,7 +97,10 @@ bool VFakeParameterModel::setEnumIndex(int i_Row, int i_Index)
 
 void VFakeParameterModel::resetToDefault(int i_Row)
 {
-	m_Parameters.at(std::size_t(i_Row)).m_Value.reset();
+	VFakeParameter& rParameter = m_Parameters.at(std::size_t(i_Row));
+	rParameter.m_Value.reset();
+	if (!rParameter.m_Default.isEmpty())
+		rParameter.m_Value = rParameter.m_Default;
 	Tell(i_Row);
 }
 

@@ -22,6 +22,8 @@ struct VFakeParameter
 	bool m_bAdvanced = false;
 	std::optional<double> m_Minimum = {};
 	std::optional<double> m_Maximum = {};
+	/// Also where there is nothing to choose from.
+	bool m_bEnumerated = false;
 	QStringList m_EnumNames = {};
 };
 

@@ -7,7 +7,7 @@ T.CheckBox {
 
 	property string toolTip: ""
 
-	implicitWidth: Math.ceil(caption.implicitWidth) + caption.leftPadding + leftPadding + rightPadding
+	implicitWidth: Math.ceil(caption.implicitWidth) + leftPadding + rightPadding
 	implicitHeight: Theme.controlHeight
 	padding: 2
 	font.pixelSize: Theme.fontSize
@@ -57,7 +57,7 @@ T.CheckBox {
 
 	contentItem: Text {
 		id: caption
-		leftPadding: 14 + 6
+		leftPadding: control.text !== "" ? 14 + 6 : 14
 		text: control.text
 		textFormat: Text.PlainText
 		font: control.font

@@ -1,5 +1,6 @@
 import QtQuick 2.15
 import QtQuick.Templates 2.15 as T
+import QtQuick.Window 2.15
 import Orlex.Theme 1.0
 
 // Picks one of a list of texts. A long list can be filtered by typing: an entry stays if it holds every word typed, in
@@ -136,7 +137,6 @@ T.Control {
 
 		// Indices of the entries that the filter leaves.
 		property var rows: []
-		property bool hadFocus: false
 		readonly property real wanted: rowsHeight + (control.filterable ? Theme.controlHeight + 24 : 0) + 2 * padding
 		readonly property real rowsHeight: Math.max(1, Math.min(control.count, 18)) * Theme.itemHeight
 
@@ -144,7 +144,8 @@ T.Control {
 			const words = filterField.text.toLowerCase().split(" ").filter(word => word !== "")
 			const before = rows.length > 0 && list.currentIndex >= 0 ? rows[list.currentIndex] : control.currentIndex
 			const found = []
-			for (let i = 0; i < control.count; ++i) {
+			// "count" may not have followed the model yet.
+			for (let i = 0; control.model && i < control.model.length; ++i) {
 				const entry = words.length > 0 ? control.model[i].toLowerCase() : ""
 				if (words.every(word => entry.includes(word)))
 					found.push(i)
@@ -170,21 +171,16 @@ T.Control {
 		padding: 1
 		focus: true
 		closePolicy: T.Popup.CloseOnEscape | T.Popup.CloseOnPressOutsideParent
-		onAboutToShow: {
-			list.currentIndex = rows.indexOf(control.currentIndex)
-			if (list.currentIndex < 0 && rows.length > 0)
-				list.currentIndex = 0
-			place()
-		}
+		onAboutToShow: place()
 		onOpened: {
+			list.currentIndex = rows.length > 0 ? Math.max(0, rows.indexOf(control.currentIndex)) : -1
 			if (control.filterable)
 				filterField.forceActiveFocus()
 			else
 				list.forceActiveFocus()
 			list.positionViewAtIndex(list.currentIndex, ListView.Center)
 		}
-		onAboutToHide: hadFocus = popup.activeFocus
-		onClosed: if (hadFocus) control.forceActiveFocus(Qt.PopupFocusReason)
+		onClosed: control.forceActiveFocus(Qt.PopupFocusReason)
 
 		background: Rectangle {
 			color: Theme.dark
@@ -212,8 +208,10 @@ T.Control {
 				else if (event.key === Qt.Key_Return || event.key === Qt.Key_Enter
 						|| event.key === Qt.Key_Space && !control.filterable)
 					control.pick(list.currentIndex >= 0 ? popup.rows[list.currentIndex] : -1)
-				else if (event.key === Qt.Key_Tab || event.key === Qt.Key_Backtab)
+				else if (event.key === Qt.Key_Tab || event.key === Qt.Key_Backtab) {
 					popup.close()
+					control.nextItemInFocusChain(event.key === Qt.Key_Tab).forceActiveFocus(Qt.TabFocusReason)
+				}
 				else
 					event.accepted = false
 			}

@@ -10,6 +10,9 @@ FieldFrame {
 	property alias area: area
 	property string error: ""
 
+	// Ctrl+Enter.
+	signal accepted()
+
 	implicitHeight: 4 * Theme.itemHeight
 	focused: area.activeFocus
 	hovered: area.hovered
@@ -39,9 +42,14 @@ FieldFrame {
 			selectByMouse: true
 			hoverEnabled: true
 			// Tab goes on to the next control.
-			KeyNavigation.priority: KeyNavigation.BeforeItem
-			KeyNavigation.tab: area.nextItemInFocusChain(true)
-			KeyNavigation.backtab: area.nextItemInFocusChain(false)
+			Keys.onTabPressed: nextItemInFocusChain(true).forceActiveFocus(Qt.TabFocusReason)
+			Keys.onBacktabPressed: nextItemInFocusChain(false).forceActiveFocus(Qt.BacktabFocusReason)
+			Keys.onPressed: {
+				event.accepted = (event.key === Qt.Key_Return || event.key === Qt.Key_Enter)
+					&& (event.modifiers & Qt.ControlModifier) !== 0
+				if (event.accepted)
+					frame.accepted()
+			}
 			Accessible.role: Accessible.EditableText
 			Accessible.multiLine: true
 			Accessible.name: frame.Accessible.name

@@ -23,7 +23,7 @@ Rectangle {
 	implicitWidth: 13
 	implicitHeight: 13
 	radius: 2
-	color: "transparent"
+	color: Theme.dark
 	border.width: 1
 	border.color: side === "L" ? "#6f9ccf" : "#d99a6a"
 	Accessible.ignored: true

@@ -26,10 +26,11 @@ OrlexButton {
 	Accessible.name: row ? row.label + ": " + toolTip : ""
 	onClicked: {
 		dialog.active = true
+		dialog.item.open()
+		// Behind the opening: a dialog that opens for the first time forgets the folder that it was given.
 		const first = row.valueText.split(";")[0]
 		if (first !== "")
 			dialog.item.folder = access === folder ? Tessel.fileUrl(first) : Tessel.folderUrl(first)
-		dialog.item.open()
 	}
 
 	Loader {

@@ -32,6 +32,7 @@ Item {
 		error: editor.row ? editor.row.error : ""
 		area.objectName: editor.row ? editor.row.name : ""
 		Accessible.name: editor.row ? editor.row.label : ""
+		onAccepted: editor.commit()
 
 		Connections {
 			target: field.area
@@ -51,12 +52,6 @@ Item {
 				event.accepted = true
 				editor.row.error = ""
 				editor.restore()
-			}
-		}
-		area.Keys.onPressed: {
-			if ((event.key === Qt.Key_Return || event.key === Qt.Key_Enter) && event.modifiers & Qt.ControlModifier) {
-				event.accepted = true
-				editor.commit()
 			}
 		}
 	}

@@ -22,10 +22,12 @@ Item {
 	readonly property bool enumerated: parameter.enumerated === undefined ? enumNames.length > 0 : parameter.enumerated
 	readonly property bool bounded: isNumber(parameter.minimum) && isNumber(parameter.maximum)
 		&& parameter.maximum > parameter.minimum
-	readonly property bool checkable: parameter.presentationHint === checkableSlider
-		|| parameter.presentationHint === checkableOption && parameter.type !== "bool"
-	// A parameter that can be switched off is edited only while it has a value.
-	readonly property bool editable: !checkable || !!parameter.hasValue
+	// Can be switched off, so that it has no value; one with a default always has a value.
+	readonly property bool checkable: defaultText === "" && (parameter.presentationHint === checkableSlider
+		|| parameter.presentationHint === checkableOption && parameter.type !== "bool")
+	// Switched on, and waiting for its first value.
+	property bool wanted: false
+	readonly property bool editable: !checkable || !!parameter.hasValue || wanted
 
 	// Presentation hints and kinds of file access, as the store numbers them.
 	readonly property int slider: 1
@@ -69,17 +71,19 @@ Item {
 		id: switcher
 		objectName: row.name + "Switch"
 		visible: row.checkable
-		width: visible ? implicitWidth : 0
+		width: visible ? implicitWidth + 4 : 0
 		Accessible.name: row.label + " is set"
-		Component.onCompleted: checked = Qt.binding(() => !!row.parameter.hasValue)
+		Component.onCompleted: checked = Qt.binding(() => row.editable)
 		onToggled: {
-			if (checked)
-				row.commit(row.defaultText !== "" ? row.defaultText
-					: row.isNumber(row.parameter.minimum) ? String(row.parameter.minimum)
-					: row.enumerated && row.parameter.enumTexts.length > 0 ? row.parameter.enumTexts[0] : row.valueText)
-			else
+			row.error = ""
+			row.wanted = checked
+			if (!checked)
 				row.groupModel.resetToDefault(row.parameterIndex)
-			checked = Qt.binding(() => !!row.parameter.hasValue)
+			else if (row.enumerated)
+				row.groupModel.setEnumIndex(row.parameterIndex, 0)
+			else if (row.parameter.type === "int" || row.parameter.type === "double")
+				row.commit(row.isNumber(row.parameter.minimum) ? String(row.parameter.minimum) : "0")
+			checked = Qt.binding(() => row.editable)
 		}
 	}
 	OrlexLabel {
@@ -112,7 +116,7 @@ Item {
 		text: "\u21ba"
 		toolTip: "Back to the default" + (row.defaultText !== "" ? ": " + row.defaultText : "")
 		Accessible.name: row.label + ": back to the default"
-		visible: !row.checkable && row.defaultText !== "" && row.valueText !== row.defaultText
+		visible: row.defaultText !== "" && row.valueText !== row.defaultText
 		background: null
 		onClicked: {
 			row.error = ""

@@ -14,6 +14,7 @@ Item {
 	function restore() {
 		edited = false
 		field.text = Qt.binding(() => valueText)
+		showEnd()
 	}
 	function commit() {
 		if (!edited)
@@ -21,6 +22,12 @@ Item {
 		edited = false
 		if (row.commit(field.text))
 			restore()
+	}
+
+	// The start of a long text tells more than its end; of a path the end.
+	function showEnd() {
+		if (!field.activeFocus)
+			field.cursorPosition = fileButton.visible ? field.length : 0
 	}
 
 	implicitHeight: Theme.controlHeight
@@ -41,9 +48,7 @@ Item {
 		}
 		onEditingFinished: {
 			editor.commit()
-			// The start of a long text tells more than its end.
-			if (!activeFocus)
-				cursorPosition = 0
+			editor.showEnd()
 		}
 		Keys.onEscapePressed: {
 			event.accepted = editor.edited || error !== ""
