@@ -73,14 +73,14 @@ std::string VHelpFormatter::make_group(
 std::string VHelpFormatter::make_usage(const CLI::App* i_pApp, std::string i_Name) const
 {
 	// CLI11 hands the chain of names for a command's help.
-	std::string usage = "\nUsage: " + (i_Name.empty() ? std::string("retarget") : i_Name);
+	std::string usage = "\nUsage: " + (i_Name.empty() ? i_pApp->get_name() : i_Name);
 	for (const CLI::Option* pOption : i_pApp->get_options())
 		if (pOption->get_positional())
 			usage += " " + make_option_usage(pOption);
 	for (const CLI::Option* pOption : i_pApp->get_options())
 		if (pOption->nonpositional() && pOption->get_required())
 			usage += " " + pOption->get_name() + " " + pOption->get_option_text();
-	usage += i_pApp->get_parent() ? " [OPTIONS]\n" : " COMMAND [OPTIONS]\n";
+	usage += i_pApp->get_subcommands({}).empty() ? " [OPTIONS]\n" : " COMMAND [OPTIONS]\n";
 	return usage;
 }
 

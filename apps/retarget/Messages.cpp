@@ -1,7 +1,5 @@
 #include "retarget/Messages.h"
 
-#include "DebugServices/GlobalLog.h"
-
 #include <cstdio>
 #include <cstdlib>
 #include <unistd.h>
@@ -29,6 +27,8 @@ const VLevel& LevelOf(int i_Level)
 	return c_Levels[3];
 }
 
+} // namespace
+
 int DefaultLevel(const VMessageSettings& i_rSettings)
 {
 	const int steps = i_rSettings.m_Verbose - i_rSettings.m_Quiet;
@@ -37,7 +37,32 @@ int DefaultLevel(const VMessageSettings& i_rSettings)
 	return steps == 0 ? NVX::ELogWarning : steps == 1 ? NVX::ELogInformation : NVX::ELogDetail;
 }
 
-} // namespace
+const char* LevelName(int i_Level)
+{
+	return LevelOf(i_Level).m_pName;
+}
+
+std::string OneLine(std::string i_Message)
+{
+	while (!i_Message.empty() && (i_Message.back() == '\n' || i_Message.back() == '\r'))
+		i_Message.pop_back();
+	for (char& rByte : i_Message)
+		if (static_cast<unsigned char>(rByte) < 0x20 || rByte == 0x7F)
+			rByte = ' ';
+	return i_Message;
+}
+
+void PrintMessage(const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)
+{
+	static const bool s_bColour = []
+	{
+		const char* pNoColour = std::getenv("NO_COLOR");
+		return isatty(STDERR_FILENO) && !(pNoColour && *pNoColour);
+	}();
+	const VLevel& rLevel = LevelOf(i_Level);
+	std::fprintf(stderr, "%s%s%s %s: %s\n", s_bColour ? rLevel.m_pColour : "", rLevel.m_pName,
+	    s_bColour ? "\033[0m" : "", i_rCategory.Name().c_str(), OneLine(i_rMessage).c_str());
+}
 
 bool ParseCategoryLevel(const std::string& i_rText, VMessageSettings& io_rSettings)
 {
@@ -61,22 +86,7 @@ std::shared_ptr<void> ShowMessages(const VMessageSettings& i_rSettings)
 	for (const auto& [rName, level] : i_rSettings.m_CategoryLevels)
 		NVX::GlobalLog::Category(rName).SetLevel(level);
 
-	const char* pNoColour = std::getenv("NO_COLOR");
-	const bool bColour = isatty(STDERR_FILENO) && !(pNoColour && *pNoColour);
-	return NVX::GlobalLog::AddSink(
-	    [bColour](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)
-	    {
-		    const VLevel& rLevel = LevelOf(i_Level);
-		    std::string text = i_rMessage;
-		    while (!text.empty() && (text.back() == '\n' || text.back() == '\r'))
-			    text.pop_back();
-		    // What comes out of a file must not drive the terminal, nor pretend to be another message.
-		    for (char& rByte : text)
-			    if (static_cast<unsigned char>(rByte) < 0x20 || rByte == 0x7F)
-				    rByte = ' ';
-		    std::fprintf(stderr, "%s%s%s %s: %s\n", bColour ? rLevel.m_pColour : "", rLevel.m_pName,
-		        bColour ? "\033[0m" : "", i_rCategory.Name().c_str(), text.c_str());
-	    });
+	return NVX::GlobalLog::AddSink(PrintMessage);
 }
 
 } // namespace CommandLine

@@ -11,11 +11,9 @@ namespace FBXIO
 {
 
 /// Gives vertices their texture coordinates. Where these are given by polygon vertex the vertices become one for each
-/// coordinate; io_rIndices, the vertices of all polygons, follow.
-/// @param i_pName the node's, for messages: meshes of some exporters have none.
+/// coordinate; i_rIndices, the vertices of all polygons, follow.
 template <typename TVertex>
-void ApplyTexCoords(
-    FbxMesh& io_rFrom, const char* i_pName, std::vector<TVertex>& io_rVertices, std::vector<std::uint32_t>& io_rIndices)
+void ApplyTexCoords(FbxMesh& io_rFrom, std::vector<TVertex>& io_rVertices, std::vector<std::uint32_t>& io_rIndices)
 {
 	FbxGeometryElementUV* const pUV = io_rFrom.GetElementUV(0);
 	if (!pUV)
@@ -73,10 +71,10 @@ void ApplyTexCoords(
 	if (moved > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
 		    "%1% polygon vertices of mesh %2% are moved to other control points that share their texture coordinate",
-		    moved, i_pName);
+		    moved, io_rFrom.GetName());
 	if (missing > 0)
-		NVX_LOG(
-		    "FBXIO", NVX::ELogWarning, "%1% polygon vertices of mesh %2% have no texture coordinate", missing, i_pName);
+		NVX_LOG("FBXIO", NVX::ELogWarning, "%1% polygon vertices of mesh %2% have no texture coordinate", missing,
+		    io_rFrom.GetName());
 }
 
 /// Cuts polygons into fans of triangles, each for the part of its material.

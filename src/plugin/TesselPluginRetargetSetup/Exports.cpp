@@ -16,5 +16,5 @@ void DestroyPlugin(TesselPluginInterface::IPlugin* i_pPlugin)
 
 std::uint64_t PluginBuildRevision()
 {
-	return 125783;
+	return TesselPluginInterface::c_PluginBuildRevision;
 }

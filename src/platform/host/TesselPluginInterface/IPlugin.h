@@ -9,6 +9,9 @@ namespace TesselPluginInterface
 class IPluginContext;
 class IPluginGui;
 
+/// What PluginBuildRevision of a module for this host returns.
+inline constexpr std::uint64_t c_PluginBuildRevision = 125783;
+
 /// What the host sees of a module: it calls by slot, so the order of the declarations is part of the interface.
 /// All calls come on the user interface thread: RegisterQmlTypes, CreateContent, then ReleaseContent before the end.
 class IPlugin

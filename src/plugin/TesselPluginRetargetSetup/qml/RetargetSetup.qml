@@ -65,22 +65,22 @@ Rectangle {
 		onActivated: retargetSetup.addTarget(false)
 	}
 
-	OrlexFileDialog {
+	FileDialog {
 		id: loadDialog
 		objectName: "loadDialog"
 		title: "Choose a file"
-		startFolder: ContextRetargetsUrl
+		folder: ContextRetargetsUrl
 		nameFilters: ["Subject files (*.qrr)", "Legacy subject files (*.qrx)"]
 		onAccepted: {
 			if (fileUrls.length === 1)
 				ContextRetargetSetup.LoadTargetSubjectURL(fileUrls[0])
 		}
 	}
-	OrlexFileDialog {
+	FileDialog {
 		id: saveDialog
 		objectName: "saveDialog"
 		title: "Choose a file"
-		startFolder: ContextRetargetsUrl
+		folder: ContextRetargetsUrl
 		nameFilters: ["Subject files (*.qrr)"]
 		selectExisting: false
 		defaultSuffix: "qrr"

@@ -1,4 +1,5 @@
 import QtQuick 2.15
+import QtQuick.Dialogs 1.3
 import Orlex.Controls 1.0
 import TesselQML 1.0
 
@@ -25,15 +26,17 @@ OrlexButton {
 	Accessible.name: row ? row.label + ": " + toolTip : ""
 	onClicked: {
 		dialog.active = true
-		const first = row.valueText.split(";")[0]
-		dialog.item.startFolder = access === folder ? Tessel.fileUrl(first) : Tessel.folderUrl(first)
 		dialog.item.open()
+		// Behind the opening: a dialog that opens for the first time forgets the folder that it was given.
+		const first = row.valueText.split(";")[0]
+		if (first !== "")
+			dialog.item.folder = access === folder ? Tessel.fileUrl(first) : Tessel.folderUrl(first)
 	}
 
 	Loader {
 		id: dialog
 		active: false
-		sourceComponent: OrlexFileDialog {
+		sourceComponent: FileDialog {
 			title: button.toolTip
 			selectFolder: button.access === button.folder
 			selectExisting: button.access !== button.save

@@ -1,0 +1,124 @@
+#include "retarget/Parsing.h"
+
+#include "retarget/ExitStatus.h"
+#include "retarget/Suggest.h"
+
+namespace CommandLine
+{
+namespace
+{
+
+std::string SeeHelp(const CLI::App& i_rApp)
+{
+	const CLI::App* const pProgram = i_rApp.get_parent();
+	return "see \"" + (pProgram ? pProgram->get_name() + " " : "") + i_rApp.get_name() + " --help\"";
+}
+
+/// The closest of a few fixed names, if it can be a slip of the hand.
+std::string Meant(const std::string& i_rWord, const std::vector<std::string>& i_rNames)
+{
+	const std::vector<std::string> closest = Closest(i_rWord, i_rNames, 1);
+	if (closest.empty() || EditDistance(i_rWord, closest.front()) > std::max<std::size_t>(1, i_rWord.size() / 3))
+		return "";
+	return "; did you mean \"" + closest.front() + "\"?";
+}
+
+/// The first word of the line that no option and no command takes, with what may have been meant. Empty if there is
+/// none.
+std::string DescribeUnexpected(const CLI::App& i_rApp)
+{
+	for (const CLI::App* pCommand : i_rApp.get_subcommands())
+		if (std::string text = DescribeUnexpected(*pCommand); !text.empty())
+			return text;
+	std::vector<std::string> rest = i_rApp.remaining();
+	// The mark that ends the options is no word of its own.
+	std::erase(rest, "--");
+	if (rest.empty())
+		return "";
+	const std::string& rWord = rest.front();
+	std::vector<std::string> names;
+	if (rWord.size() > 1 && rWord[0] == '-')
+	{
+		for (const CLI::Option* pOption : i_rApp.get_options())
+			for (const std::string& rName : pOption->get_lnames())
+				names.push_back("--" + rName);
+		std::string text =
+		    "there is no option \"" + rWord + "\"" + Meant(rWord.substr(0, rWord.find('=')), names) + "; ";
+		if (rWord[1] != '-')
+			text += "put -- before a text that begins with -; ";
+		return text + SeeHelp(i_rApp);
+	}
+	if (i_rApp.get_parent())
+		return "\"" + rWord + "\" is one argument too many; " + SeeHelp(i_rApp);
+	for (const CLI::App* pCommand :
+	    i_rApp.get_subcommands([](const CLI::App* i_pApp) { return !i_pApp->get_group().empty(); }))
+		names.push_back(pCommand->get_name());
+	return "there is no command \"" + rWord + "\"" + Meant(rWord, names) + "; " + SeeHelp(i_rApp);
+}
+
+const CLI::App& ParsedApp(const CLI::App& i_rApp)
+{
+	const std::vector<CLI::App*> parsed = i_rApp.get_subcommands();
+	return parsed.empty() ? i_rApp : *parsed.front();
+}
+
+} // namespace
+
+void AddMessageOptions(CLI::App& io_rApp, const std::shared_ptr<VMessageSettings>& i_rpSettings)
+{
+	io_rApp
+	    .add_flag_callback(
+	        "-v,--verbose", [i_rpSettings] { ++i_rpSettings->m_Verbose; }, "Show more messages; twice for every detail")
+	    ->trigger_on_parse()
+	    ->group("Messages");
+	io_rApp
+	    .add_flag_callback(
+	        "-q,--quiet", [i_rpSettings] { ++i_rpSettings->m_Quiet; }, "Show errors only")
+	    ->trigger_on_parse()
+	    ->group("Messages");
+	io_rApp
+	    .add_option_function<std::string>(
+	        "--log",
+	        [i_rpSettings](const std::string& i_rText)
+	        {
+		        if (!ParseCategoryLevel(i_rText, *i_rpSettings))
+			        throw CLI::ValidationError("--log",
+			            "\"" + i_rText
+			                + "\" is not CATEGORY=LEVEL with a level of error, warning, information or detail");
+	        },
+	        "Level of one category of messages: error, warning, information or detail; also as -v CATEGORY=LEVEL")
+	    ->option_text("CATEGORY=LEVEL")
+	    ->trigger_on_parse()
+	    ->group("Messages");
+}
+
+void Parse(CLI::App& io_rProgram, std::vector<std::string> i_Arguments)
+{
+	VMessageSettings ignored;
+	for (std::size_t i = 0; i + 1 < i_Arguments.size() && i_Arguments[i] != "--"; ++i)
+		if (i_Arguments[i] == "-v" && ParseCategoryLevel(i_Arguments[i + 1], ignored))
+			i_Arguments[i] = "--log";
+	std::reverse(i_Arguments.begin(), i_Arguments.end());
+	try
+	{
+		io_rProgram.parse(std::move(i_Arguments));
+	}
+	catch (const CLI::CallForHelp&)
+	{
+		throw;
+	}
+	catch (const CLI::CallForVersion&)
+	{
+		throw;
+	}
+	catch (const CLI::ParseError& rError)
+	{
+		const std::string unexpected = DescribeUnexpected(io_rProgram);
+		throw VCommandError(EWrongUsage,
+		    unexpected.empty() ? rError.what() + std::string("; ") + SeeHelp(ParsedApp(io_rProgram)) : unexpected);
+	}
+	if (const std::string unexpected = DescribeUnexpected(io_rProgram); !unexpected.empty())
+		throw VCommandError(EWrongUsage, unexpected);
+}
+
+} // namespace CommandLine

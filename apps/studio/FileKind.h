@@ -1,0 +1,30 @@
+#pragma once
+
+#include <QString>
+#include <QStringList>
+
+namespace StudioHost
+{
+
+/// The kinds of files that can be opened, in the order in which several are.
+enum class EFileKind
+{
+	ESource,
+	EFbx,
+	ETarget,
+	EOther
+};
+
+/// By the file's extension, in any case.
+EFileKind KindOf(const QString& i_rPath);
+
+/// "performer's skeleton (.qrs)".
+QString Description(EFileKind i_Kind);
+
+/// The filter of a file dialog.
+QString DialogFilter(EFileKind i_Kind);
+
+/// Orders files by kind; those of one kind stay in order.
+void SortByKind(QStringList& io_rPaths);
+
+} // namespace StudioHost

@@ -1,0 +1,37 @@
+#pragma once
+
+#include "retarget/Messages.h"
+
+#include <QSize>
+#include <QString>
+#include <QStringList>
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace StudioHost
+{
+
+/// What the command line asks for.
+struct VOptions
+{
+	/// Empty for the one that stands beside the program.
+	QString m_Module;
+	/// Empty for the user's own settings.
+	QString m_Settings;
+	/// To open at the start, in this order.
+	QStringList m_Files;
+	/// Where the picture goes; empty for a window that stays.
+	QString m_Screenshot;
+	QSize m_Size;
+	bool m_bDeveloper = false;
+	CommandLine::VMessageSettings m_Messages;
+};
+
+/// Reads a command line, the program's own name left out. Throws CommandLine::VCommandError for one that is wrong.
+/// @param o_rText what is to be printed instead of a run: the help or the version.
+/// @return nothing if there is something to print.
+std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::string& o_rText);
+
+} // namespace StudioHost

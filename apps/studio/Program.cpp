@@ -1,0 +1,178 @@
+#include "studio/Program.h"
+
+#include "DebugServices/GlobalLog.h"
+#include "retarget/ExitStatus.h"
+#include "studio/DarkStyle.h"
+#include "studio/Module.h"
+#include "studio/OpenGLCheck.h"
+#include "studio/Options.h"
+#include "studio/QtDispatcher.h"
+#include "studio/QtMessages.h"
+#include "studio/RetargetPanel.h"
+#include "studio/Screenshot.h"
+#include "studio/StudioWindow.h"
+
+#include <QApplication>
+#include <QFileInfo>
+#include <QQuickWidget>
+
+#include <atomic>
+#include <cstdio>
+
+using CommandLine::EBadInput;
+using CommandLine::EBadOutput;
+using CommandLine::EFine;
+
+namespace StudioHost
+{
+namespace
+{
+
+constexpr const char* c_pCategory = "retarget-studio";
+
+/// The window's list takes information, too; standard error only what was asked for.
+std::shared_ptr<void> ShowMessagesOnTerminal(const CommandLine::VMessageSettings& i_rSettings)
+{
+	const int level = CommandLine::DefaultLevel(i_rSettings);
+	NVX::GlobalLog::SetDefaultLevel(std::max<int>(level, NVX::ELogInformation));
+	for (const auto& [rName, categoryLevel] : i_rSettings.m_CategoryLevels)
+		NVX::GlobalLog::Category(rName).SetLevel(categoryLevel);
+	return NVX::GlobalLog::AddSink(
+	    [level, levels = i_rSettings.m_CategoryLevels](
+	        const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)
+	    {
+		    const auto found = levels.find(i_rCategory.Name());
+		    if (i_Level <= (found == levels.end() ? level : found->second))
+			    CommandLine::PrintMessage(i_rCategory, i_Level, i_rMessage);
+	    });
+}
+
+/// Counts errors for as long as it lives.
+class VErrorCount
+{
+public:
+	VErrorCount()
+	    : m_pSink(NVX::GlobalLog::AddSink(
+	        [this](const NVX::VLogCategory&, int i_Level, const std::string&)
+	        {
+		        if (i_Level <= NVX::ELogError)
+			        ++m_Count;
+	        }))
+	{
+	}
+	int Count() const { return m_Count; }
+
+private:
+	std::atomic<int> m_Count{0};
+	const std::shared_ptr<void> m_pSink;
+};
+
+/// Qt ends the process when there is no display.
+bool HasDisplay()
+{
+	for (const char* pName : {"DISPLAY", "WAYLAND_DISPLAY", "QT_QPA_PLATFORM"})
+		if (!qEnvironmentVariableIsEmpty(pName))
+			return true;
+	return false;
+}
+
+int Fail(CommandLine::EExitStatus i_Status, const std::string& i_rMessage)
+{
+	NVX_LOG(c_pCategory, NVX::ELogError, "%1%", i_rMessage);
+	return i_Status;
+}
+
+std::unique_ptr<QSettings> OpenSettings(const QString& i_rPath)
+{
+	auto pSettings =
+	    i_rPath.isEmpty() ? std::make_unique<QSettings>() : std::make_unique<QSettings>(i_rPath, QSettings::IniFormat);
+	if (pSettings->status() != QSettings::NoError)
+		NVX_LOG(
+		    c_pCategory, NVX::ELogWarning, "The settings in %1% cannot be read", pSettings->fileName().toStdString());
+	return pSettings;
+}
+
+int RunScreenshot(QApplication& io_rApplication, VStudioWindow& io_rWindow, const QString& i_rPath)
+{
+	auto* const pPanel =
+	    io_rWindow.RetargetPanel() ? qobject_cast<QQuickWidget*>(io_rWindow.RetargetPanel()->Widget()) : nullptr;
+	if (!pPanel || !io_rWindow.RetargetPanel()->IsReady())
+		return Fail(EBadInput, "There is no panel to take a picture of");
+	bool bSaved = false;
+	VScreenshot screenshot(io_rWindow, *pPanel, i_rPath);
+	QObject::connect(&screenshot, &VScreenshot::done, &io_rApplication,
+	    [&](bool i_bSaved)
+	    {
+		    bSaved = i_bSaved;
+		    QApplication::quit();
+	    });
+	QApplication::exec();
+	return bSaved ? EFine : EBadOutput;
+}
+
+int RunWindow(QApplication& io_rApplication, const VOptions& i_rOptions)
+{
+	const VErrorCount errors;
+	const std::unique_ptr<QSettings> pSettings = OpenSettings(i_rOptions.m_Settings);
+	CheckOpenGL();
+	VStudioWindow window(*pSettings, i_rOptions.m_bDeveloper);
+	const QString module = i_rOptions.m_Module.isEmpty() ? DefaultModulePath() : i_rOptions.m_Module;
+	if (module.isEmpty())
+		NVX_LOG(c_pCategory, NVX::ELogError, "The module that comes with this program is not in its place");
+	const bool bLoaded = !module.isEmpty() && window.LoadModule(module);
+
+	const bool bScreenshot = !i_rOptions.m_Screenshot.isEmpty();
+	if (!bScreenshot)
+		window.RestoreLayout();
+	if (i_rOptions.m_Size.isValid())
+		window.resize(i_rOptions.m_Size);
+	window.show();
+	for (const QString& rFile : i_rOptions.m_Files)
+		window.Open(rFile);
+	if (!bScreenshot)
+		return QApplication::exec();
+	if (!bLoaded)
+		return EBadInput;
+	const int status = RunScreenshot(io_rApplication, window, i_rOptions.m_Screenshot);
+	return status == EFine && errors.Count() > 0 ? EBadInput : status;
+}
+
+} // namespace
+
+int Run(int i_Count, char** i_ppArguments)
+{
+	std::shared_ptr<void> pMessages = CommandLine::ShowMessages({});
+	try
+	{
+		std::string text;
+		const std::optional<VOptions> options = ParseOptions({i_ppArguments + 1, i_ppArguments + i_Count}, text);
+		if (!options)
+		{
+			std::fputs(text.c_str(), stdout);
+			return EFine;
+		}
+		if (!HasDisplay())
+			return Fail(EBadInput, "There is no display to show a window on: set DISPLAY, or use the program retarget");
+		pMessages = ShowMessagesOnTerminal(options->m_Messages);
+		SendQtMessagesToLog();
+		QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts);
+		QCoreApplication::setOrganizationName(QStringLiteral("RetargetSetup"));
+		QCoreApplication::setApplicationName(QStringLiteral("retarget-studio"));
+		QCoreApplication::setApplicationVersion(QStringLiteral(RETARGET_VERSION));
+		// The command line is ours alone.
+		int count = 1;
+		QApplication application(count, i_ppArguments);
+		ApplyDarkStyle(application);
+		return RunWindow(application, *options);
+	}
+	catch (const CommandLine::VCommandError& rError)
+	{
+		return Fail(rError.Status(), rError.what());
+	}
+	catch (const std::exception& rError)
+	{
+		return Fail(EBadInput, rError.what());
+	}
+}
+
+} // namespace StudioHost

@@ -1,0 +1,137 @@
+#include "studio/RetargetPanel.h"
+
+#include "DebugServices/GlobalLog.h"
+#include "NVX/IQuickWidget.h"
+#include "TesselDataStore/StoredValue.h"
+#include "TesselPluginInterface/IParameter.h"
+#include "TesselPluginInterface/IParameterGroup.h"
+#include "TesselPluginInterface/IParameterRegistry.h"
+#include "studio/FileKind.h"
+
+#include <QFileInfo>
+#include <QQuickItem>
+#include <QQuickWidget>
+
+namespace StudioHost
+{
+namespace
+{
+
+constexpr const char* c_pDocument = "ContextRetargetSetup";
+constexpr const char* c_pParameterPath = "RetargetSetup";
+constexpr const char* c_pParameterGroup = "Subject";
+constexpr const char* c_pCurrentFile = "currentTargetSubjectURL";
+
+} // namespace
+
+std::unique_ptr<VRetargetPanel> VRetargetPanel::Find(
+    QWidget& i_rPanel, std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters)
+{
+	auto* const pQuick = qobject_cast<NVX::IQuickWidget*>(&i_rPanel);
+	QObject* const pDocument = pQuick ? pQuick->contextProperty(QLatin1String(c_pDocument)).value<QObject*>() : nullptr;
+	if (!pDocument)
+		return nullptr;
+	return std::unique_ptr<VRetargetPanel>(new VRetargetPanel(i_rPanel, *pDocument, std::move(i_pParameters)));
+}
+
+VRetargetPanel::VRetargetPanel(
+    QWidget& i_rPanel, QObject& i_rDocument, std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters)
+    : m_pWidget(&i_rPanel), m_pDocument(&i_rDocument), m_pParameters(std::move(i_pParameters))
+{
+	connect(m_pDocument, SIGNAL(commandIgnored(QString, QString)), this, SLOT(TellIgnored(QString, QString)));
+	connect(m_pDocument, SIGNAL(targetSubjectLoaded(QUrl)), this, SLOT(TellLoaded(QUrl)));
+	if (auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data()))
+		connect(pQuickWidget, &QQuickWidget::statusChanged, this, &VRetargetPanel::FollowRootItem);
+	FollowRootItem();
+}
+
+bool VRetargetPanel::IsReady() const
+{
+	return m_pRoot;
+}
+
+void VRetargetPanel::FollowRootItem()
+{
+	const auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data());
+	QObject* const pRoot = pQuickWidget ? pQuickWidget->rootObject() : nullptr;
+	if (!pRoot || pRoot == m_pRoot)
+		return;
+	m_pRoot = pRoot;
+	if (pRoot->metaObject()->indexOfProperty(c_pCurrentFile) >= 0)
+		connect(pRoot, SIGNAL(currentTargetSubjectURLChanged()), this, SLOT(TellCurrentFile()));
+	emit ready();
+}
+
+bool VRetargetPanel::Open(const QString& i_rPath)
+{
+	const QFileInfo file(i_rPath);
+	const QString path = file.absoluteFilePath();
+	const EFileKind kind = KindOf(path);
+	if (kind == EFileKind::EOther)
+	{
+		NVX_LOG("Import", NVX::ELogError, "%1% is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx",
+		    path.toStdString());
+		return false;
+	}
+	if (!file.isFile() || !file.isReadable())
+	{
+		NVX_LOG("Import", NVX::ELogError, "%1% %2%", path.toStdString(),
+		    file.exists() ? "is no file that can be read" : "does not exist");
+		return false;
+	}
+	switch (kind)
+	{
+	case EFileKind::ESource: return SetParameter("SourceSkeleton", path);
+	case EFileKind::EFbx: return SetParameter("TargetFBX", path);
+	default:
+		return QMetaObject::invokeMethod(
+		    m_pDocument, "LoadTargetSubjectURL", Qt::DirectConnection, Q_ARG(QUrl, QUrl::fromLocalFile(path)));
+	}
+}
+
+bool VRetargetPanel::SetParameter(const char* i_pName, const QString& i_rPath)
+{
+	const auto pGroup = m_pParameters->Find(c_pParameterPath, c_pParameterGroup);
+	const auto pParameter = pGroup ? pGroup->Find(i_pName) : nullptr;
+	if (!pParameter)
+	{
+		NVX_LOG("Import", NVX::ELogError, "%1% cannot be opened: the panel has no parameter %2%", i_rPath.toStdString(),
+		    i_pName);
+		return false;
+	}
+	// The panel offers a file from outside its folders by itself.
+	pParameter->SetValue(TesselDataStore::ToVariant(i_rPath.toStdString()));
+	emit fileUsed(i_rPath);
+	return true;
+}
+
+void VRetargetPanel::Save()
+{
+	if (!m_pRoot)
+		return;
+	// Without a file the panel asks for one.
+	QObject* const pDialog = m_pRoot->findChild<QObject*>(QStringLiteral("saveDialog"));
+	if (m_pRoot->property(c_pCurrentFile).toUrl().isLocalFile())
+		QMetaObject::invokeMethod(m_pRoot, "save");
+	else if (pDialog)
+		QMetaObject::invokeMethod(pDialog, "open");
+}
+
+void VRetargetPanel::TellIgnored(const QString& i_rCommand, const QString& i_rReason)
+{
+	NVX_LOG("Command", NVX::ELogWarning, "%1% did nothing: %2%", i_rCommand.toStdString(), i_rReason.toStdString());
+}
+
+void VRetargetPanel::TellLoaded(const QUrl& i_rUrl)
+{
+	emit fileUsed(i_rUrl.toLocalFile());
+}
+
+void VRetargetPanel::TellCurrentFile()
+{
+	const QUrl url = m_pRoot ? m_pRoot->property(c_pCurrentFile).toUrl() : QUrl();
+	if (url.isLocalFile())
+		emit fileUsed(url.toLocalFile());
+}
+
+} // namespace StudioHost

@@ -1,0 +1,69 @@
+#pragma once
+
+#include <QObject>
+#include <QPointer>
+#include <QString>
+#include <QUrl>
+#include <QVariant>
+
+#include <memory>
+
+class QWidget;
+
+namespace TesselPluginInterface
+{
+class IParameterRegistry;
+}
+
+namespace StudioHost
+{
+
+/// The "Retarget Setup" panel as far as this program knows it: by the names that it shows to its QML and the names of
+/// its parameters, not by its classes.
+class VRetargetPanel : public QObject
+{
+	Q_OBJECT
+
+public:
+	/// Nothing if the widget is no such panel.
+	static std::unique_ptr<VRetargetPanel> Find(
+	    QWidget& i_rPanel, std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters);
+
+	/// Opens a file by its kind, as the panel's own controls would. Why a file is not opened is told in the log.
+	/// @return false if it was not even tried.
+	bool Open(const QString& i_rPath);
+
+	/// Saves the target subject to its file; the panel asks for one if there is none.
+	void Save();
+
+	QWidget* Widget() const { return m_pWidget; }
+
+	/// The panel's QML has been loaded.
+	bool IsReady() const;
+
+signals:
+	/// A file was opened, or the target subject saved to it.
+	void fileUsed(const QString& i_rPath);
+
+	void ready();
+
+private:
+	VRetargetPanel(QWidget& i_rPanel, QObject& i_rDocument,
+	    std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters);
+
+	bool SetParameter(const char* i_pName, const QString& i_rPath);
+	void FollowRootItem();
+
+private slots:
+	void TellIgnored(const QString& i_rCommand, const QString& i_rReason);
+	void TellCurrentFile();
+	void TellLoaded(const QUrl& i_rUrl);
+
+private:
+	const QPointer<QWidget> m_pWidget;
+	const QPointer<QObject> m_pDocument;
+	const std::shared_ptr<TesselPluginInterface::IParameterRegistry> m_pParameters;
+	QPointer<QObject> m_pRoot;
+};
+
+} // namespace StudioHost

@@ -1,0 +1,172 @@
+#include "studio/StudioWindow.h"
+
+#include "TesselPluginInterface/PathTypes.h"
+#include "studio/FileKind.h"
+#include "studio/Named.h"
+#include "studio/PreferencesDialog.h"
+#include "studio/RecentFiles.h"
+#include "studio/RetargetPanel.h"
+#include "studio/Services.h"
+
+#include <QAction>
+#include <QDockWidget>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QMenu>
+#include <QMenuBar>
+#include <QMessageBox>
+
+namespace StudioHost
+{
+namespace
+{
+
+struct VOpenRow
+{
+	EFileKind m_Kind;
+	const char* m_pName;
+	const char* m_pText;
+	const char* m_pShortcut;
+	TesselPluginInterface::EPathTypes m_Folder;
+};
+
+constexpr VOpenRow c_OpenRows[] = {
+    {EFileKind::ESource, "OpenSource", QT_TRANSLATE_NOOP("Studio", "Open &Source Skeleton..."), "Ctrl+Shift+O",
+        TesselPluginInterface::EPathSubjects},
+    {EFileKind::EFbx, "OpenFbx", QT_TRANSLATE_NOOP("Studio", "Open &FBX..."), "Ctrl+Shift+F",
+        TesselPluginInterface::EPathSkins},
+    {EFileKind::ETarget, "OpenTarget", QT_TRANSLATE_NOOP("Studio", "&Open Retarget Subject..."), "Ctrl+O",
+        TesselPluginInterface::EPathRetargets}};
+
+struct VCommandRow
+{
+	const char* m_pName;
+	const char* m_pText;
+	const char* m_pShortcut;
+	const char* m_pCommand;
+};
+
+constexpr VCommandRow c_CommandRows[] = {
+    {"FrameSelected", QT_TRANSLATE_NOOP("Studio", "&Frame Selected"), "Ctrl+F", "Workspace3d:FrameSelected"},
+    {"ScaleUpManipulator", QT_TRANSLATE_NOOP("Studio", "&Larger Manipulator"), "Ctrl++",
+        "Workspace3d:ScaleUpManipulator"},
+    {"ScaleDownManipulator", QT_TRANSLATE_NOOP("Studio", "&Smaller Manipulator"), "Ctrl+-",
+        "Workspace3d:ScaleDownManipulator"}};
+
+} // namespace
+
+QAction* VStudioWindow::AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText,
+    const QKeySequence& i_rShortcut, std::function<void()> i_Run)
+{
+	QAction* const pAction = io_rMenu.addAction(i_rText);
+	pAction->setObjectName(QLatin1String(i_pName));
+	pAction->setShortcut(i_rShortcut);
+	connect(pAction, &QAction::triggered, this, std::move(i_Run));
+	return pAction;
+}
+
+void VStudioWindow::MakeMenus(bool i_bDeveloper)
+{
+	Named(menuBar(), "MenuBar", tr("Menus"));
+	MakeFileMenu();
+	MakeViewMenu(i_bDeveloper);
+	MakeHelpMenu();
+}
+
+void VStudioWindow::MakeFileMenu()
+{
+	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&File")), "FileMenu", tr("File"));
+	for (const VOpenRow& rRow : c_OpenRows)
+		AddAction(rMenu, rRow.m_pName, tr(rRow.m_pText), QKeySequence(rRow.m_pShortcut),
+		    [this, kind = int(rRow.m_Kind)] { AskAndOpen(kind); });
+	m_pRecentMenu = Named(rMenu.addMenu(tr("Open &Recent")), "RecentMenu", tr("Files used last"));
+	connect(m_pRecentFiles.get(), &VRecentFiles::changed, this, &VStudioWindow::UpdateRecentFiles);
+	UpdateRecentFiles();
+	rMenu.addSeparator();
+	AddAction(rMenu, "Save", tr("&Save Retarget Subject"), QKeySequence::Save,
+	    [this]
+	    {
+		    if (m_pRetargetPanel)
+			    m_pRetargetPanel->Save();
+	    });
+	rMenu.addSeparator();
+	AddAction(rMenu, "PreferencesAction", tr("&Preferences..."), QKeySequence(QStringLiteral("Ctrl+,")),
+	    [this] { ShowPreferences(); });
+	rMenu.addSeparator();
+	AddAction(rMenu, "Quit", tr("&Quit"), QKeySequence::Quit, [this] { close(); });
+}
+
+void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
+{
+	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&View")), "ViewMenu", tr("View"));
+	for (const VCommandRow& rRow : c_CommandRows)
+		AddAction(rMenu, rRow.m_pName, tr(rRow.m_pText), QKeySequence(rRow.m_pShortcut),
+		    [this, pCommand = rRow.m_pCommand] { Execute(QLatin1String(pCommand)); });
+	rMenu.addSeparator();
+	m_pPanelMenu = Named(rMenu.addMenu(tr("&Panels")), "PanelMenu", tr("Panels"));
+	m_pPanelMenu->addAction(m_pLogDock->toggleViewAction());
+	if (i_bDeveloper)
+	{
+		rMenu.addSeparator();
+		AddAction(rMenu, "Reload", tr("&Reload QML"), QKeySequence(Qt::Key_F5),
+		    [this] { m_pGui->QuickEngine().ReloadSignal().Fire(); });
+	}
+}
+
+void VStudioWindow::MakeHelpMenu()
+{
+	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&Help")), "HelpMenu", tr("Help"));
+	AddAction(rMenu, "About", tr("&About"), {}, [this] { ShowAbout(); });
+}
+
+void VStudioWindow::AskAndOpen(int i_Kind)
+{
+	for (const VOpenRow& rRow : c_OpenRows)
+	{
+		if (int(rRow.m_Kind) != i_Kind)
+			continue;
+		const char* const pKey = TesselPluginInterface::c_FolderKeys[rRow.m_Folder];
+		const QString folder = QString::fromStdString(m_pContext->Preferences().Folder(pKey).string());
+		const QString file = QFileDialog::getOpenFileName(
+		    this, tr("Choose a file"), folder, DialogFilter(rRow.m_Kind) + QStringLiteral(";;") + tr("All files (*)"));
+		if (!file.isEmpty())
+			Open(file);
+	}
+}
+
+void VStudioWindow::UpdateRecentFiles()
+{
+	m_pRecentMenu->clear();
+	int number = 0;
+	for (const QString& rFile : m_pRecentFiles->Files())
+	{
+		++number;
+		// A "&" in a name is no mnemonic.
+		const QString text = QStringLiteral("&%1  %2").arg(number % 10).arg(QString(rFile).replace('&', "&&"));
+		AddAction(*m_pRecentMenu, "RecentFile", text, {},
+		    [this, rFile]
+		    {
+			    if (!Open(rFile))
+				    m_pRecentFiles->Remove(rFile);
+		    });
+	}
+	m_pRecentMenu->setEnabled(number > 0);
+	if (number == 0)
+		return;
+	m_pRecentMenu->addSeparator();
+	AddAction(*m_pRecentMenu, "ClearRecentFiles", tr("&Clear"), {}, [this] { m_pRecentFiles->Clear(); });
+}
+
+void VStudioWindow::ShowAbout()
+{
+	QMessageBox box(QMessageBox::NoIcon, tr("About"),
+	    tr("<b>Retarget Studio %1</b><p>Relates a performer's skeleton to a character's, and saves the retarget "
+	       "subject "
+	       "that a real-time solver moves the character by.</p>")
+	        .arg(QStringLiteral(RETARGET_VERSION)),
+	    QMessageBox::Close, this);
+	Named(&box, "AboutBox", tr("About"));
+	box.exec();
+}
+
+} // namespace StudioHost

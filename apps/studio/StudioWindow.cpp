@@ -1,0 +1,182 @@
+#include "studio/StudioWindow.h"
+
+#include "DebugServices/GlobalLog.h"
+#include "studio/FileKind.h"
+#include "studio/LogModel.h"
+#include "studio/LogPanel.h"
+#include "studio/Module.h"
+#include "studio/Named.h"
+#include "studio/PanelCommands.h"
+#include "studio/PreferencesDialog.h"
+#include "studio/RecentFiles.h"
+#include "studio/RetargetPanel.h"
+#include "studio/Services.h"
+
+#include <QCloseEvent>
+#include <QDockWidget>
+#include <QLabel>
+#include <QMenu>
+#include <QMimeData>
+#include <QStatusBar>
+
+namespace StudioHost
+{
+namespace
+{
+
+/// Raised when docks change so that an old layout does not fit them.
+constexpr int c_LayoutVersion = 1;
+const QString c_GeometryKey = QStringLiteral("Window/Geometry");
+const QString c_StateKey = QStringLiteral("Window/State");
+
+QStringList LocalFiles(const QMimeData& i_rData)
+{
+	QStringList files;
+	for (const QUrl& rUrl : i_rData.urls())
+		if (rUrl.isLocalFile())
+			files << rUrl.toLocalFile();
+	return files;
+}
+
+} // namespace
+
+VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget* i_pParent)
+    : QMainWindow(i_pParent), m_rSettings(i_rSettings), m_pDispatcher(std::make_shared<VQtDispatcher>()),
+      m_pLog(std::make_unique<VLogModel>(m_pDispatcher)), m_pRecentFiles(std::make_unique<VRecentFiles>(m_rSettings)),
+      m_pContext(std::make_unique<VPluginContext>(m_rSettings, m_pDispatcher)),
+      m_pGui(std::make_unique<VPluginGui>(
+          *this, *m_pContext, i_bDeveloper, [this](const QString& i_rCommand) { return Execute(i_rCommand); }))
+{
+	Named(this, "StudioWindow", tr("Retarget Studio"));
+	setWindowTitle(tr("Retarget Studio"));
+	setAcceptDrops(true);
+	setDockNestingEnabled(true);
+
+	m_pNotice = Named(new QLabel, "Notice", tr("Why there is no panel"));
+	m_pNotice->setAlignment(Qt::AlignCenter);
+	m_pNotice->setWordWrap(true);
+	m_pNotice->setMargin(40);
+	m_pNotice->setTextInteractionFlags(Qt::TextSelectableByMouse);
+	setCentralWidget(m_pNotice);
+	Say(tr("No module is loaded"));
+
+	m_pLogDock = Named(new QDockWidget(tr("Log"), this), "LogDock", tr("Log"));
+	m_pLogDock->setWidget(new VLogPanel(*m_pLog));
+	addDockWidget(Qt::BottomDockWidgetArea, m_pLogDock);
+
+	MakeMenus(i_bDeveloper);
+	resize(1280, 800);
+	resizeDocks({m_pLogDock}, {130}, Qt::Vertical);
+}
+
+VStudioWindow::~VStudioWindow()
+{
+	UnloadModule();
+	// Shows the log model, which goes before the window's children do.
+	delete m_pLogDock;
+}
+
+bool VStudioWindow::LoadModule(const QString& i_rPath)
+{
+	UnloadModule();
+	QString why;
+	std::unique_ptr<VModule> pModule = VModule::Load(i_rPath, why);
+	if (pModule && !pModule->CreateContent(*m_pContext, *m_pGui))
+	{
+		why = tr("%1 could not make its panels").arg(pModule->Path());
+		m_pGui->PanelManager().Clear();
+		pModule.reset();
+	}
+	if (!pModule)
+	{
+		NVX_LOG("System", NVX::ELogError, "No module is loaded: %1%", why.toStdString());
+		Say(tr("No module is loaded: %1").arg(why));
+		return false;
+	}
+	NVX_LOG("System", NVX::ELogInformation, "Module %1% is loaded", pModule->Path().toStdString());
+	m_pModule = std::move(pModule);
+
+	for (QDockWidget* pDock : m_pGui->PanelManager().Docks())
+		m_pPanelMenu->addAction(pDock->toggleViewAction());
+	for (QWidget* pPanel : m_pGui->PanelManager().Panels())
+		if (!m_pRetargetPanel)
+			m_pRetargetPanel = VRetargetPanel::Find(*pPanel, m_pContext->GetParameterRegistry());
+	if (m_pRetargetPanel)
+		connect(m_pRetargetPanel.get(), &VRetargetPanel::fileUsed, m_pRecentFiles.get(), &VRecentFiles::Add);
+	m_pNotice->setVisible(m_pGui->PanelManager().Panels().isEmpty());
+	return true;
+}
+
+void VStudioWindow::UnloadModule()
+{
+	m_pRetargetPanel.reset();
+	m_pGui->PanelManager().Clear();
+	if (!m_pModule)
+		return;
+	m_pModule.reset();
+	Say(tr("No module is loaded"));
+}
+
+bool VStudioWindow::Open(const QString& i_rPath)
+{
+	if (m_pRetargetPanel)
+		return m_pRetargetPanel->Open(i_rPath);
+	NVX_LOG("Import", NVX::ELogError, "%1% cannot be opened: no module with a retarget panel is loaded",
+	    i_rPath.toStdString());
+	return false;
+}
+
+bool VStudioWindow::Execute(const QString& i_rCommand)
+{
+	return RunCommand(m_pGui->PanelManager().Panels(), i_rCommand);
+}
+
+void VStudioWindow::RestoreLayout()
+{
+	restoreGeometry(m_rSettings.value(c_GeometryKey).toByteArray());
+	restoreState(m_rSettings.value(c_StateKey).toByteArray(), c_LayoutVersion);
+}
+
+void VStudioWindow::ShowPreferences()
+{
+	VPreferencesDialog(m_pContext->Preferences(), this).exec();
+}
+
+void VStudioWindow::closeEvent(QCloseEvent* i_pEvent)
+{
+	m_rSettings.setValue(c_GeometryKey, saveGeometry());
+	m_rSettings.setValue(c_StateKey, saveState(c_LayoutVersion));
+	QMainWindow::closeEvent(i_pEvent);
+}
+
+void VStudioWindow::dragEnterEvent(QDragEnterEvent* i_pEvent)
+{
+	for (const QString& rFile : LocalFiles(*i_pEvent->mimeData()))
+	{
+		if (KindOf(rFile) == EFileKind::EOther)
+			continue;
+		// The files stay where they are, whatever the other side offers.
+		i_pEvent->setDropAction(Qt::CopyAction);
+		i_pEvent->accept();
+		return;
+	}
+	i_pEvent->ignore();
+}
+
+void VStudioWindow::dropEvent(QDropEvent* i_pEvent)
+{
+	QStringList files = LocalFiles(*i_pEvent->mimeData());
+	SortByKind(files);
+	i_pEvent->setDropAction(Qt::CopyAction);
+	i_pEvent->accept();
+	for (const QString& rFile : files)
+		Open(rFile);
+}
+
+void VStudioWindow::Say(const QString& i_rText)
+{
+	m_pNotice->setText(i_rText);
+	m_pNotice->show();
+}
+
+} // namespace StudioHost

@@ -1,0 +1,86 @@
+#pragma once
+
+#include <QMainWindow>
+#include <QSettings>
+
+#include <memory>
+
+class QLabel;
+
+namespace StudioHost
+{
+
+class VLogModel;
+class VModule;
+class VPluginContext;
+class VPluginGui;
+class VQtDispatcher;
+class VRecentFiles;
+class VRetargetPanel;
+
+/// The window: the panels of the module, the log, the menus. It owns all services that the module is given, and ends
+/// them in the right order: panels, plug-in, services.
+class VStudioWindow : public QMainWindow
+{
+	Q_OBJECT
+
+public:
+	/// @param i_rSettings of layout, folders, recent files and panels; must outlive the window.
+	explicit VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper = false, QWidget* i_pParent = nullptr);
+	~VStudioWindow() override;
+
+	/// Replaces the module. Why there is none after it is told in the log and in the window.
+	bool LoadModule(const QString& i_rPath);
+	void UnloadModule();
+
+	/// Opens a file by its kind. False, with the reason told in the log, if it was not even tried.
+	bool Open(const QString& i_rPath);
+
+	/// Runs a named command on the panels.
+	bool Execute(const QString& i_rCommand);
+
+	/// As it was when the window closed last.
+	void RestoreLayout();
+
+	VPluginContext& Context() { return *m_pContext; }
+	VPluginGui& Gui() { return *m_pGui; }
+	VQtDispatcher& Dispatcher() { return *m_pDispatcher; }
+	VLogModel& Log() { return *m_pLog; }
+	/// Null without a module that has one.
+	VRetargetPanel* RetargetPanel() { return m_pRetargetPanel.get(); }
+
+	void ShowPreferences();
+
+protected:
+	void closeEvent(QCloseEvent* i_pEvent) override;
+	void dragEnterEvent(QDragEnterEvent* i_pEvent) override;
+	void dropEvent(QDropEvent* i_pEvent) override;
+
+private:
+	void MakeMenus(bool i_bDeveloper);
+	void MakeFileMenu();
+	void MakeViewMenu(bool i_bDeveloper);
+	void MakeHelpMenu();
+	QAction* AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText, const QKeySequence& i_rShortcut,
+	    std::function<void()> i_Run);
+	void AskAndOpen(int i_Kind);
+	void UpdateRecentFiles();
+	void ShowAbout();
+	void Say(const QString& i_rText);
+
+	QSettings& m_rSettings;
+	const std::shared_ptr<VQtDispatcher> m_pDispatcher;
+	const std::unique_ptr<VLogModel> m_pLog;
+	const std::unique_ptr<VRecentFiles> m_pRecentFiles;
+	const std::unique_ptr<VPluginContext> m_pContext;
+	const std::unique_ptr<VPluginGui> m_pGui;
+	std::unique_ptr<VModule> m_pModule;
+	std::unique_ptr<VRetargetPanel> m_pRetargetPanel;
+	QMenu* m_pRecentMenu = nullptr;
+	QMenu* m_pPanelMenu = nullptr;
+	/// What stands in the window where there is no panel.
+	QLabel* m_pNotice = nullptr;
+	QDockWidget* m_pLogDock = nullptr;
+};
+
+} // namespace StudioHost
