@@ -1,24 +1,57 @@
 #include "TesselPluginRetargetSetup/TesselPluginRetargetSetup.h"
 
+#include "OrlexGraphics/SceneFramebufferObject.h"
+#include "OrlexGraphics/TesselInteractionMapper.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/RetargetSetupSelection.h"
 #include "TesselPluginInterface/IPluginContext.h"
+#include "TesselPluginInterface/IPluginGui.h"
+#include "TesselPluginRetargetSetup/RetargetSetupScene.h"
+#include "TesselPluginRetargetSetup/RetargetSetupWidget.h"
+
+#include <QtQml>
+
+namespace
+{
+
+/// The mouse in the preview as the host's preferences want it, between CreateContent and ReleaseContent.
+std::shared_ptr<CoreGraphics::VInteractionMapper> g_pInteractionMapper;
+
+} // namespace
 
 bool VTesselPluginRetargetSetup::RegisterQmlTypes()
 {
-	// The list models register their own types when they are made.
+	qmlRegisterType<OrlexGraphics::VSceneFramebufferObject>(
+	    "TesselPluginRetargetSetup", 1, 0, "SceneFramebufferObject");
 	return true;
 }
 
 bool VTesselPluginRetargetSetup::CreateContent(
-    TesselPluginInterface::IPluginContext& i_rContext, TesselPluginInterface::IPluginGui& /*i_rGui*/)
+    TesselPluginInterface::IPluginContext& i_rContext, TesselPluginInterface::IPluginGui& i_rGui)
 {
+	g_pInteractionMapper = NVX::MakeShared<OrlexGraphics::VTesselInteractionMapper>(
+	    i_rContext.GetPreferenceFolders(), i_rContext.GetDispatcher());
+	CoreGraphics::VInteractionMapper::SetActive(g_pInteractionMapper);
 	const auto pRetargetSetup = std::make_shared<VRetargetSetup>(
 	    i_rContext.GetDispatcher(), i_rContext.GetFrameFactory(), i_rContext.GetItemFactory());
-	// A panel would own the document from here on; without one it ends with this call.
+	const auto pSelection =
+	    NVX::MakeShared<VRetargetSetupSelection>(i_rContext.GetDispatcher(), i_rContext.GetSelectionManager());
+	const bool bSceneFlag = i_rContext.GetSceneFlag();
+	const auto pScene = NVX::MakeShared<VRetargetSetupScene>(i_rGui.GetGraphicsContext(), i_rContext.GetDispatcher(),
+	    i_rContext.GetSelectionManager(), i_rGui.GetSkinCache(), pRetargetSetup, i_rContext.GetItemFactory(),
+	    bSceneFlag);
+	auto pWidget = std::make_unique<VRetargetSetupWidget>(i_rGui.GetQuickEngine(), i_rContext.GetDataStore(),
+	    i_rContext.GetParameterRegistry(), i_rContext.GetPreferenceFolders(), i_rContext.GetApplicationObject(),
+	    i_rContext.GetDispatcher(), i_rGui.GetSkinCache(), pRetargetSetup, pSelection, pScene);
+	i_rGui.GetPanelManager()->AddPanel("Retarget Setup", 5500, pWidget.get());
+	// The host owns it from here on.
+	pWidget.release();
 	return true;
 }
 
 bool VTesselPluginRetargetSetup::ReleaseContent()
 {
+	CoreGraphics::VInteractionMapper::SetActive(nullptr);
+	g_pInteractionMapper.reset();
 	return true;
 }

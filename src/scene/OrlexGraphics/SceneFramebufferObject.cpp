@@ -10,8 +10,6 @@
 #include "OrlexGraphics/SceneFramebufferRenderer.h"
 #include "OrlexGraphics/SceneOptionsMap.h"
 
-#include <QQmlPropertyMap>
-
 #include <algorithm>
 #include <cmath>
 

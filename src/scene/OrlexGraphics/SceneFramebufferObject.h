@@ -7,12 +7,11 @@
 
 #include <QList>
 #include <QPointer>
+#include <QQmlPropertyMap>
 #include <QQuickFramebufferObject>
 
 #include <cstdint>
 #include <memory>
-
-class QQmlPropertyMap;
 
 namespace CoreGraphics
 {

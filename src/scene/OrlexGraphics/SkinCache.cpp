@@ -71,6 +71,12 @@ std::shared_ptr<FileSystemWatcher::VFileSystemWatcher> VSkinCache::MakeWatcher(c
 	}
 }
 
+bool VSkinCache::HasFolders(const std::string& i_rGroup)
+{
+	const std::lock_guard lock(m_Mutex);
+	return m_Groups.contains(i_rGroup);
+}
+
 std::uint32_t VSkinCache::GetPath(
     boost::filesystem::path& o_rPath, const std::string& i_rName, const std::string& i_rGroup)
 {

@@ -51,6 +51,9 @@ public:
 	/// nothing.
 	void SetFolders(const std::string& i_rGroup, const std::vector<boost::filesystem::path>& i_rFolders);
 
+	/// Whether folders were set for a group, none included.
+	bool HasFolders(const std::string& i_rGroup);
+
 	/// The file of a skin; of two folders that have it the later one counts.
 	/// @return SkinStatus: ready, not found, or disposed.
 	std::uint32_t GetPath(boost::filesystem::path& o_rPath, const std::string& i_rName, const std::string& i_rGroup);

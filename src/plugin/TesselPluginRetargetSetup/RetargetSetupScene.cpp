@@ -1,0 +1,108 @@
+#include "TesselPluginRetargetSetup/RetargetSetupScene.h"
+
+#include "OrlexGraphics/SkinCache.h"
+#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/StaleSelection.h"
+#include "TesselPluginInterface/ISelectionManager.h"
+#include "TesselPluginRetargetSetup/ManipulatorMove.h"
+
+using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectParametrised;
+using NVX::ISelectionItem;
+
+namespace
+{
+
+ISelectionItem TargetSegment(std::size_t i_Index)
+{
+	return {NVX::ESelectionTargetSegment, RetargetSetup::c_SubjectId, std::uint32_t(i_Index), {}};
+}
+
+} // namespace
+
+VRetargetSetupScene::VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pGraphicsContext,
+    std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
+    std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager,
+    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache, std::shared_ptr<VRetargetSetup> i_pRetargetSetup,
+    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory, bool i_bAllowHiddenPick)
+    : VFlowScene(std::move(i_pGraphicsContext), std::move(i_pSelectionManager), std::move(i_pSkinCache),
+        std::move(i_pDispatcher), i_bAllowHiddenPick),
+      m_pRetargetSetup(std::move(i_pRetargetSetup)), m_pItemFactory(std::move(i_pItemFactory))
+{
+}
+
+VRetargetSetupScene::~VRetargetSetupScene() = default;
+
+void VRetargetSetupScene::OnShared()
+{
+	const auto onSelectionChanged = WeakBind(&VRetargetSetupScene::OnSelectionChanged);
+	SelectionManager()->Selection().ChangedSignal().Connect(onSelectionChanged, Dispatcher());
+	SelectionManager()->PreSelection().ChangedSignal().Connect(onSelectionChanged, Dispatcher());
+	SkinCache()->ChangedSignal().Connect(WeakBind(&VRetargetSetupScene::RefreshScene), Dispatcher());
+	m_pRetargetSetup->GetChangedSignal().Connect(WeakBind(&VRetargetSetupScene::OnSetupChanged), Dispatcher());
+}
+
+void VRetargetSetupScene::OnSetupChanged()
+{
+	RetargetSetup::DropStaleItems(*m_pRetargetSetup, *SelectionManager());
+	RefreshScene();
+}
+
+void VRetargetSetupScene::RefreshScene()
+{
+	if (const auto pFrame = m_pRetargetSetup->GetCurrentFrame())
+		SetFrame(pFrame);
+}
+
+std::int64_t VRetargetSetupScene::GetSelectedTargetSegment(std::vector<ISelectionItem>& o_rSelection) const
+{
+	for (const ISelectionItem& rItem : SelectionManager()->Selection().ItemsOfKind(NVX::ESelectionTargetSegment))
+	{
+		if (rItem.m_SubjectId == RetargetSetup::c_SubjectId)
+			return rItem.m_ElementIndex;
+		o_rSelection.push_back(rItem);
+	}
+	return -1;
+}
+
+void VRetargetSetupScene::OnSelectionChanged()
+{
+	if (!Manipulator())
+		return;
+	std::vector<ISelectionItem> others;
+	const std::int64_t segment = GetSelectedTargetSegment(others);
+	if (segment != -1)
+		GetItemTransform({TargetSegment(std::size_t(segment))}, m_ManipulatorOrigin);
+	RefreshScene();
+}
+
+void VRetargetSetupScene::ComputeJointFrame(
+    QMatrix4x4& o_rMatrix, const VSubject& i_rSubject, std::size_t i_SegmentIndex) const
+{
+	const VSubject::VSegment& rSegment = i_rSubject.m_Segments[i_SegmentIndex];
+	QMatrix4x4 parent;
+	if (rSegment.m_ParentSegmentIndex != CoreOrlexTypes::c_NoParent)
+		GetItemTransform({TargetSegment(rSegment.m_ParentSegmentIndex)}, parent);
+	o_rMatrix = RetargetSetup::JointFrame(parent, rSegment);
+}
+
+void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
+{
+	const VRetargetSetup::VSubjectValues target = m_pRetargetSetup->TargetValues();
+	if (!target.m_pSubject || !target.m_pParametrised)
+		return;
+	VSubjectParametrised subject = *target.m_pParametrised;
+	std::vector<ISelectionItem> others;
+	// No segment, -1, is beyond all segments.
+	RetargetSetup::MoveSegment(subject, std::size_t(GetSelectedTargetSegment(others)), i_rMatrix, m_ManipulatorOrigin,
+	    m_pRetargetSetup->JointSymmetry(),
+	    [&](std::size_t i_SegmentIndex)
+	    {
+		    QMatrix4x4 frame;
+		    ComputeJointFrame(frame, *target.m_pSubject, i_SegmentIndex);
+		    return frame;
+	    });
+	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject));
+	RefreshScene();
+}

@@ -1,0 +1,58 @@
+#pragma once
+
+#include "CoreOrlexTypes/Subject.h"
+#include "Flow2Graphics/FlowScene.h"
+#include "NVX/Shared.h"
+#include "TesselPluginInterface/IItemFactory.h"
+
+#include <QMatrix4x4>
+
+#include <cstdint>
+#include <memory>
+#include <vector>
+
+class VRetargetSetup;
+
+/// The preview of the panel: both subjects of the document in their bind poses, and the manipulator that poses the
+/// target subject. Made by NVX::MakeShared; follows document, skins and selection from then on. User interface thread
+/// only, but for what VFlowScene names as the render thread's.
+class VRetargetSetupScene : public Flow2Graphics::VFlowScene, public NVX::VShared
+{
+	Q_OBJECT
+
+public:
+	VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pGraphicsContext,
+	    std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
+	    std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager,
+	    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache, std::shared_ptr<VRetargetSetup> i_pRetargetSetup,
+	    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory, bool i_bAllowHiddenPick);
+	~VRetargetSetupScene() override;
+
+	/// Shows what the document has now.
+	void RefreshScene();
+
+	void OnSelectionChanged();
+
+	/// Poses the selected target segment, and with joint symmetry the one on the other side.
+	/// @param i_rMatrix the new world matrix of the manipulator.
+	void OnManipulatorMoved(const QMatrix4x4& i_rMatrix);
+
+	/// The first selected segment of the target subject, -1 if there is none.
+	/// @param o_rSelection the selected items before it that are none.
+	std::int64_t GetSelectedTargetSegment(std::vector<NVX::ISelectionItem>& o_rSelection) const;
+
+	/// The frame in the world in which a segment's joint turns. The segment must be there.
+	void ComputeJointFrame(
+	    QMatrix4x4& o_rMatrix, const CoreOrlexTypes::VSubject& i_rSubject, std::size_t i_SegmentIndex) const;
+
+protected:
+	void OnShared() override;
+
+private:
+	void OnSetupChanged();
+
+	const std::shared_ptr<VRetargetSetup> m_pRetargetSetup;
+	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
+	/// Where the manipulator stood when its segment was selected.
+	QMatrix4x4 m_ManipulatorOrigin;
+};
