@@ -1,6 +1,6 @@
 """The parts of an FBX 7.x document that are the same for every scene of ours, as element trees."""
 
-from fbx_file import CREATION_TIME, FILE_ID, Element, Int64, ObjectName
+from fbx_file import CREATION_TIME, FILE_ID, Element, Int64, ObjectName, doubles, integers
 
 CREATOR = "Retarget Setup demo"
 
@@ -170,6 +170,46 @@ def skeleton_attribute(object_id, name, kind, *entries):
 def null_attribute(object_id, name):
     return branch("NodeAttribute", Int64(object_id), ObjectName(name, "NodeAttribute"), "Null", children=[
         node("TypeFlags", "Null"),
+    ])
+
+
+def layer_element(kind, index, *children):
+    """One kind of data of a mesh's corners or polygons."""
+    return branch(kind, index, children=[node("Version", 101), *children])
+
+
+def normal_layer(normals):
+    """One normal for each point."""
+    return layer_element("LayerElementNormal", 0, node("Name", ""), node("MappingInformationType", "ByVertice"),
+                         node("ReferenceInformationType", "Direct"),
+                         node("Normals", doubles([value for normal in normals for value in normal])))
+
+
+def material_layer(materials):
+    """For each polygon the place of its material among the model's."""
+    return layer_element("LayerElementMaterial", 0, node("Name", ""), node("MappingInformationType", "ByPolygon"),
+                         node("ReferenceInformationType", "IndexToDirect"), node("Materials", integers(materials)))
+
+
+def mesh_geometry(object_id, name, points, polygons, layers, *entries):
+    """A mesh: points, polygons as lists of places in points, and the layer elements of its one layer."""
+    # A polygon's last index is stored as its complement.
+    indices = [index for polygon in polygons for index in polygon[:-1] + [~polygon[-1]]]
+    return branch("Geometry", Int64(object_id), ObjectName(name, "Geometry"), "Mesh", children=[
+        properties(*entries),
+        node("Vertices", doubles([value for point in points for value in point])),
+        node("PolygonVertexIndex", integers(indices)),
+        node("GeometryVersion", 124),
+        *layers,
+        branch("Layer", 0, children=[node("Version", 100)] + [
+            branch("LayerElement", children=[node("Type", layer.name), node("TypedIndex", 0)]) for layer in layers]),
+    ])
+
+
+def material(material_id, name, color):
+    return branch("Material", Int64(material_id), ObjectName(name, "Material"), "", children=[
+        node("Version", 102), node("ShadingModel", "lambert"), node("MultiLayer", 0),
+        branch("Properties70", children=[prop("DiffuseColor", "shaded", *color)]),
     ])
 
 

@@ -12,7 +12,8 @@ import pathlib
 
 import fbx_file
 from fbx_file import Int64, ObjectName, doubles, integers
-from fbx_scene import branch, document, global_settings, model, node, null_attribute, prop, skeleton_attribute
+from fbx_scene import (branch, document, global_settings, layer_element, material, material_layer, mesh_geometry,
+                       model, node, normal_layer, null_attribute, prop, skeleton_attribute)
 from kestrel import bones
 from matrix import (axis_rotation, column_major, euler, euler_angles, identity, multiply, rigid_inverse,
                     transform_point, translation)
@@ -197,39 +198,14 @@ def build_mesh(joints):
     return mesh
 
 
-def layer_element(kind, index, *children):
-    return branch(kind, index, children=[node("Version", 101), *children])
-
-
 def geometry(mesh):
-    flat = [value for point in mesh.points for value in point]
-    # A polygon's last index is stored as its complement.
-    indices = [index for polygon in mesh.polygons for index in polygon[:-1] + [~polygon[-1]]]
-    layers = ("LayerElementNormal", "LayerElementUV", "LayerElementMaterial")
-    return branch("Geometry", Int64(GEOMETRY_ID), ObjectName("kestrelBody", "Geometry"), "Mesh", children=[
-        branch("Properties70", children=[prop("Color", "color", 0.6, 0.5, 0.4)]),
-        node("Vertices", doubles(flat)),
-        node("PolygonVertexIndex", integers(indices)),
-        node("GeometryVersion", 124),
-        layer_element("LayerElementNormal", 0, node("Name", ""), node("MappingInformationType", "ByVertice"),
-                      node("ReferenceInformationType", "Direct"),
-                      node("Normals", doubles([value for normal in mesh.normals for value in normal]))),
-        layer_element("LayerElementUV", 0, node("Name", "tubes"), node("MappingInformationType", "ByPolygonVertex"),
-                      node("ReferenceInformationType", "IndexToDirect"),
-                      node("UV", doubles([value for uv in mesh.uvs for value in uv])),
-                      node("UVIndex", integers([index for polygon in mesh.uv_polygons for index in polygon]))),
-        layer_element("LayerElementMaterial", 0, node("Name", ""), node("MappingInformationType", "ByPolygon"),
-                      node("ReferenceInformationType", "IndexToDirect"), node("Materials", integers(mesh.materials))),
-        branch("Layer", 0, children=[node("Version", 100)] + [
-            branch("LayerElement", children=[node("Type", layer), node("TypedIndex", 0)]) for layer in layers]),
-    ])
-
-
-def material(material_id, name, color):
-    return branch("Material", Int64(material_id), ObjectName(name, "Material"), "", children=[
-        node("Version", 102), node("ShadingModel", "lambert"), node("MultiLayer", 0),
-        branch("Properties70", children=[prop("DiffuseColor", "shaded", *color)]),
-    ])
+    uvs = layer_element("LayerElementUV", 0, node("Name", "tubes"), node("MappingInformationType", "ByPolygonVertex"),
+                        node("ReferenceInformationType", "IndexToDirect"),
+                        node("UV", doubles([value for uv in mesh.uvs for value in uv])),
+                        node("UVIndex", integers([index for polygon in mesh.uv_polygons for index in polygon])))
+    layers = [normal_layer(mesh.normals), uvs, material_layer(mesh.materials)]
+    return mesh_geometry(GEOMETRY_ID, "kestrelBody", mesh.points, mesh.polygons, layers,
+                         prop("Color", "color", 0.6, 0.5, 0.4))
 
 
 def skin(joints, mesh):

@@ -87,7 +87,8 @@ TEST(Fbx, AgreesWithTheReference)
 		SCOPED_TRACE(rEntry.path().stem().string());
 		std::ifstream stream(rEntry.path());
 		const VJson expected = VJson::parse(stream);
-		const VJson actual = Result({"fbx", Data("fbx/" + rEntry.path().stem().string() + ".fbx")}, folder);
+		const VJson actual =
+		    Result({"fbx", Data("fbx/" + rEntry.path().stem().string() + ".fbx"), "--meshes", "--skin"}, folder);
 		EXPECT_EQ(actual.at("upAxis"), expected.at("upAxis"));
 		EXPECT_EQ(actual.at("unitScale"), expected.at("unitScale"));
 		ASSERT_EQ(actual.at("bones").size(), expected.at("bones").size());
@@ -111,6 +112,41 @@ TEST(Fbx, AgreesWithTheReference)
 					    << pKey << k;
 				}
 			}
+		}
+		const VJson& rMeshes = actual.at("placedMeshes");
+		ASSERT_EQ(rMeshes.size(), expected.at("placedMeshes").size());
+		std::vector<std::size_t> skinned;
+		for (std::size_t i = 0; i < rMeshes.size(); ++i)
+		{
+			const VJson& rExpected = expected["placedMeshes"][i];
+			SCOPED_TRACE(rExpected.at("name"));
+			EXPECT_EQ(rMeshes[i].at("name"), rExpected.at("name"));
+			EXPECT_EQ(rMeshes[i].at("vertexCount"), rExpected.at("uvs"));
+			EXPECT_EQ(rMeshes[i].at("parts").size(), std::max(rExpected.at("materials").get<int>(), 1));
+			int triangles = 0;
+			for (const VJson& rPart : rMeshes[i]["parts"])
+				triangles += rPart.at("triangleCount").get<int>();
+			EXPECT_EQ(triangles, rExpected.at("triangles"));
+			for (std::size_t k = 0; k < 6; ++k)
+				EXPECT_NEAR(rMeshes[i].at("bounds")[k].get<double>(), rExpected.at("bounds")[k].get<double>(),
+				    std::max(0.01, 1e-5 * std::abs(rExpected["bounds"][k].get<double>())))
+				    << k;
+			if (rExpected.at("skinClusters") > 0)
+				skinned.push_back(i);
+		}
+		const VJson& rSkins = actual.at("skin").at("meshes");
+		ASSERT_EQ(rSkins.size(), skinned.size());
+		EXPECT_LE(actual["skin"].at("skeleton").size(), expected.at("bones").size());
+		EXPECT_EQ(actual["skin"]["skeleton"].empty(), skinned.empty());
+		for (std::size_t i = 0; i < rSkins.size(); ++i)
+		{
+			EXPECT_EQ(rSkins[i].at("vertexCount"), rMeshes[skinned[i]]["vertexCount"]);
+			EXPECT_EQ(rSkins[i].at("partCount"), rMeshes[skinned[i]]["parts"].size());
+			std::size_t vertices = 0;
+			for (const VJson& rCount : rSkins[i].at("influences"))
+				vertices += rCount.get<std::size_t>();
+			EXPECT_EQ(vertices, rSkins[i]["vertexCount"]);
+			EXPECT_EQ(rSkins[i]["influences"][0], 0) << "every vertex is bound";
 		}
 		++files;
 	}

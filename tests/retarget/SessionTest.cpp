@@ -46,7 +46,7 @@ void RunSession(const std::string& i_rPage, std::size_t i_Steps)
 
 TEST(Session, OfTheCommandLinesPage)
 {
-	RunSession("docs/command-line.md", 12);
+	RunSession("docs/command-line.md", 13);
 }
 
 TEST(Session, OfTheFirstScreen)

@@ -15,6 +15,7 @@ class VApplication : public testing::Environment
 public:
 	void SetUp() override
 	{
+		qputenv("QT_XCB_GL_INTEGRATION", "none");
 		QQuickWindow::setSceneGraphBackend(QSGRendererInterface::Software);
 		m_pApplication = std::make_unique<QApplication>(m_Count, m_pArguments);
 	}

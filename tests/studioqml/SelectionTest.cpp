@@ -182,6 +182,19 @@ TEST(Table, KeysMoveTheSelection)
 	EXPECT_TRUE(page.Has("tableRow39"));
 }
 
+TEST(Table, GoesToWhatIsSelectedElsewhere)
+{
+	VRows rows(40);
+	VQmlPage page;
+	page.SetContext("rows", &rows);
+	ASSERT_TRUE(page.Show(c_Table));
+	page.Click("tableRow1");
+	page.Item("table")->setProperty("selectedIndex", 30);
+	EXPECT_TRUE(page.Has("tableRow30"));
+	page.Key(Qt::Key_Down);
+	EXPECT_EQ(page.Selection().Selection().Items(), std::vector{Target(31)});
+}
+
 TEST(Table, KeepsItsScrollPositionOverAReset)
 {
 	VRows rows(100);

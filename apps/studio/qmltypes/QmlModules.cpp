@@ -1,5 +1,6 @@
 #include "studio/qmltypes/QmlModules.h"
 
+#include "studio/qmltypes/Ownership.h"
 #include "studio/qmltypes/SelectionManager.h"
 #include "studio/qmltypes/SelectionWatcher.h"
 
@@ -57,6 +58,8 @@ void RegisterTypes()
 	qmlRegisterSingletonType<VSelectionManager>(
 	    "Orlex.Selection", 1, 0, "SelectionManager", Singleton<&VEngineServices::m_Selection>);
 	qmlRegisterType<VSelectionWatcher>("Orlex.Selection", 1, 0, "SelectionWatcher");
+	qmlRegisterSingletonType<VOwnership>(
+	    "Orlex.Controls", 1, 0, "Ownership", [](QQmlEngine*, QJSEngine*) -> QObject* { return new VOwnership; });
 	qmlRegisterSingletonType<VTesselParameters>(
 	    "Orlex.Tessel.Parameters", 1, 0, "TesselParameters", Singleton<&VEngineServices::m_Parameters>);
 	qmlRegisterSingletonType<VTessel>("TesselQML", 1, 0, "Tessel", Singleton<&VEngineServices::m_Tessel>);

@@ -125,11 +125,11 @@ void FBXIO::FBXMeshReader::Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TV
 }
 
 template <typename TVertex>
-void FBXIO::FBXMeshReader::Finish(FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const
+void FBXIO::FBXMeshReader::Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const
 {
 	const int* const pVertices = io_rFrom.GetPolygonVertices();
 	std::vector<std::uint32_t> indices(pVertices, pVertices + io_rFrom.GetPolygonVertexCount());
-	ApplyTexCoords(io_rFrom, io_rMesh.m_Vertices, indices);
+	ApplyTexCoords(io_rFrom, i_rNode.GetName(), io_rMesh.m_Vertices, indices);
 	if (io_rMesh.m_Vertices.size() < c_FirstLargeCount)
 		SplitIntoParts<std::uint16_t>(io_rFrom, indices, io_rMesh.m_Parts);
 	else
@@ -151,8 +151,10 @@ void FBXIO::FBXMeshReader::ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPa
 	io_rPart.m_Ambient = ColourAndFactor(pLambert->Ambient, pLambert->AmbientFactor);
 	io_rPart.m_Diffuse = ColourAndFactor(pLambert->Diffuse, pLambert->DiffuseFactor);
 	io_rPart.m_Transparent = ColourAndFactor(pLambert->TransparentColor, pLambert->TransparencyFactor);
-	if (pLambert->Diffuse.GetSrcObjectCount<FbxFileTexture>() > 0)
-		io_rPart.m_pTexture = m_Images.Get(FindTexture(*pLambert->Diffuse.GetSrcObject<FbxFileTexture>(0)));
+	if (pLambert->Diffuse.GetSrcObjectCount<FbxFileTexture>() == 0)
+		return;
+	io_rPart.m_TexturePath = FindTexture(*pLambert->Diffuse.GetSrcObject<FbxFileTexture>(0));
+	io_rPart.m_pTexture = m_Images.Get(io_rPart.m_TexturePath);
 }
 
 std::string FBXIO::FBXMeshReader::FindTexture(const FbxFileTexture& i_rTexture) const
@@ -178,7 +180,7 @@ bool FBXIO::FBXMeshReader::ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh)
 	if (!pMesh)
 		return false;
 	Prepare(i_rNode, *pMesh, o_rMesh);
-	Finish(*pMesh, o_rMesh);
+	Finish(i_rNode, *pMesh, o_rMesh);
 	return true;
 }
 
@@ -327,5 +329,5 @@ void FBXIO::FBXMeshReader::ReadSkinMesh(FbxNode& i_rNode, std::vector<VSkinMesh>
 	VSkinMesh& rMesh = io_rMeshes.emplace_back();
 	Prepare(i_rNode, *pMesh, rMesh);
 	ReadWeights(i_rNode, *pSkin, rMesh.m_Vertices);
-	Finish(*pMesh, rMesh);
+	Finish(i_rNode, *pMesh, rMesh);
 }

@@ -45,7 +45,7 @@ private:
 	template <typename TVertex>
 	void Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& o_rMesh);
 	template <typename TVertex>
-	void Finish(FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const;
+	void Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const;
 	void ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPart& io_rPart);
 	std::string FindTexture(const FbxFileTexture& i_rTexture) const;
 	void ReadWeights(FbxNode& i_rNode, FbxSkin& i_rSkin, std::vector<VSkinVertex>& io_rVertices);

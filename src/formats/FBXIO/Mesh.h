@@ -42,8 +42,10 @@ struct VMeshPart
 	float m_Shininess = 0.0f;
 	QVector4D m_Transparent;
 	QVector4D m_Reflection;
-	/// Empty if there is none.
+	/// Empty if there is none, or none that could be read.
 	std::shared_ptr<const QImage> m_pTexture;
+	/// The file that the texture was looked for in; empty if the material names none.
+	std::string m_TexturePath;
 	/// Bytes of one index, 2 or 4.
 	std::uint32_t m_IndexSize = 2;
 	/// A list of triangles.

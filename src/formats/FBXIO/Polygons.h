@@ -11,9 +11,11 @@ namespace FBXIO
 {
 
 /// Gives vertices their texture coordinates. Where these are given by polygon vertex the vertices become one for each
-/// coordinate; i_rIndices, the vertices of all polygons, follow.
+/// coordinate; io_rIndices, the vertices of all polygons, follow.
+/// @param i_pName the node's, for messages: meshes of some exporters have none.
 template <typename TVertex>
-void ApplyTexCoords(FbxMesh& io_rFrom, std::vector<TVertex>& io_rVertices, std::vector<std::uint32_t>& io_rIndices)
+void ApplyTexCoords(
+    FbxMesh& io_rFrom, const char* i_pName, std::vector<TVertex>& io_rVertices, std::vector<std::uint32_t>& io_rIndices)
 {
 	FbxGeometryElementUV* const pUV = io_rFrom.GetElementUV(0);
 	if (!pUV)
@@ -71,10 +73,10 @@ void ApplyTexCoords(FbxMesh& io_rFrom, std::vector<TVertex>& io_rVertices, std::
 	if (moved > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
 		    "%1% polygon vertices of mesh %2% are moved to other control points that share their texture coordinate",
-		    moved, io_rFrom.GetName());
+		    moved, i_pName);
 	if (missing > 0)
-		NVX_LOG("FBXIO", NVX::ELogWarning, "%1% polygon vertices of mesh %2% have no texture coordinate", missing,
-		    io_rFrom.GetName());
+		NVX_LOG(
+		    "FBXIO", NVX::ELogWarning, "%1% polygon vertices of mesh %2% have no texture coordinate", missing, i_pName);
 }
 
 /// Cuts polygons into fans of triangles, each for the part of its material.

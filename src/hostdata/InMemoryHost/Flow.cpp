@@ -1,7 +1,7 @@
 #include "InMemoryHost/Flow.h"
 
-#include "CoreOrlexTypes/Subject.h"
-#include "CoreOrlexTypes/SubjectApplicationData.h"
+#include "Flow2TypesUtils/FlowParametersItem.h"
+#include "Flow2TypesUtils/ItemTypes.h"
 
 #include <algorithm>
 
@@ -14,12 +14,10 @@ namespace InMemoryHost
 
 VItemFactory::VItemFactory()
 {
-	for (const std::string flavour : {"", "ForSolving"})
-	{
-		Register<CoreOrlexTypes::VSubject>("FlowSubject" + flavour);
-		Register<CoreOrlexTypes::VSubjectApplicationData>("FlowSubjectApplicationData" + flavour);
-		Register<CoreOrlexTypes::VSubjectParametrised>("FlowSubjectParametrised" + flavour);
-	}
+	for (const Flow2TypesUtils::VItemDescriptor& rType : Flow2TypesUtils::ItemCatalogue())
+		Flow2TypesUtils::VisitItemType(
+		    rType.m_Value, [this, &rType]<typename T>(std::type_identity<T>) { Register<T>(rType.m_Name); });
+	Register<Flow2TypesUtils::FlowParametersItem>(Flow2TypesUtils::FlowParametersItem::c_pName);
 }
 
 CountedPointer<IFlowItem> VItemFactory::CreateItem(const std::string& i_rFlowType)

@@ -26,7 +26,7 @@ private:
 	std::shared_ptr<const T> m_pValue;
 };
 
-/// Knows the six flow types of a source and a target subject, and those that are registered.
+/// Knows the flow types of the item catalogue, items of parameters, and what is registered.
 class VItemFactory : public NVX::VCounted<TesselPluginInterface::IItemFactory>
 {
 public:

@@ -250,7 +250,7 @@ struct VReadMember : NVX::IReader
 
 struct VReadRecord : NVX::IReader
 {
-	/// In the order of the stored members; null pointers in the second place for those that fill one.
+	/// In the order of the stored members: those that fill a member, those that skip.
 	std::vector<VReader> m_Steps;
 
 	bool Read(NVX::IO::VBinaryReader& io_rBytes, void* o_pValue) const override

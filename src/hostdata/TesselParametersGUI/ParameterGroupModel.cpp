@@ -103,8 +103,9 @@ QHash<int, QByteArray> VParameterGroupModel::roleNames() const
 	    {DefaultTextRole, "defaultText"}, {PresentationHintRole, "presentationHint"},
 	    {DataConversionHintRole, "dataConversionHint"}, {FileAccessRole, "fileAccess"}, {FileFilterRole, "fileFilter"},
 	    {ValidatorRegExRole, "validatorRegEx"}, {HiddenRole, "hidden"}, {AdvancedRole, "advanced"},
-	    {DynamicRole, "dynamic"}, {MinimumRole, "minimum"}, {MaximumRole, "maximum"}, {EnumNamesRole, "enumNames"},
-	    {EnumTextsRole, "enumTexts"}, {CurrentEnumIndexRole, "currentEnumIndex"}, {TypeRole, "type"}};
+	    {DynamicRole, "dynamic"}, {MinimumRole, "minimum"}, {MaximumRole, "maximum"}, {EnumeratedRole, "enumerated"},
+	    {EnumNamesRole, "enumNames"}, {EnumTextsRole, "enumTexts"}, {CurrentEnumIndexRole, "currentEnumIndex"},
+	    {TypeRole, "type"}};
 }
 
 QString VParameterGroupModel::setValueText(int i_Row, const QString& i_rText)
@@ -220,7 +221,7 @@ void VParameterGroupModel::Read(const IParameter& i_rParameter, VRow& o_rRow)
 	    {ValidatorRegExRole, text(i_rParameter.GetValidatorRegEx())}, {HiddenRole, (flags & IParameter::EHidden) != 0},
 	    {AdvancedRole, (flags & IParameter::EAdvanced) != 0}, {DynamicRole, (flags & IParameter::EDynamic) != 0},
 	    {MinimumRole, ToQVariant(i_rParameter.GetMinimum())}, {MaximumRole, ToQVariant(i_rParameter.GetMaximum())},
-	    {EnumNamesRole, names}, {EnumTextsRole, texts},
+	    {EnumeratedRole, i_rParameter.HasEnumeration()}, {EnumNamesRole, names}, {EnumTextsRole, texts},
 	    {CurrentEnumIndexRole,
 	        current == o_rRow.m_Enumeration.end() ? -1 : int(current - o_rRow.m_Enumeration.begin())},
 	    {TypeRole, TypeText(i_rParameter.GetValueKind())}};

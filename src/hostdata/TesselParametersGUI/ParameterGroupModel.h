@@ -51,6 +51,8 @@ public:
 		/// As ValueRole; invalid for no limit.
 		MinimumRole,
 		MaximumRole,
+		/// bool: only some values are permitted, even if there is none to choose now.
+		EnumeratedRole,
 		/// QStringList; the texts are those of the values.
 		EnumNamesRole,
 		EnumTextsRole,

@@ -156,7 +156,7 @@ void VRenderContext::SetVertexFormat(const VVertexFormat& i_rFormat)
 	std::bitset<c_AttributeArrays> enabled;
 	for (const VVertexFormat::VEntry& rEntry : i_rFormat.m_Entries)
 	{
-		const int location = m_pProgram->AttributeLocation(static_cast<EAttribute>(rEntry.m_Attribute));
+		const int location = m_pProgram->AttributeLocation(rEntry.m_Attribute);
 		if (location < 0 || static_cast<std::size_t>(location) >= c_AttributeArrays)
 			continue;
 		enabled.set(static_cast<std::size_t>(location));

@@ -29,7 +29,8 @@ std::string FindResourceRoot()
 		// RETARGET_MODULE_FOLDER is where the module lies below the root of an installation.
 		for (const QString& rPlace : {folder.path(), folder.filePath(QStringLiteral(RETARGET_MODULE_FOLDER))})
 		{
-			if (QDir(rPlace).exists(QStringLiteral("Geometry")))
+			// The folder's name is common; the file's is not.
+			if (QDir(rPlace).exists(QStringLiteral("Geometry/tetra_stripe.fbx")))
 				return rPlace.toStdString();
 		}
 	} while (folder.cdUp());

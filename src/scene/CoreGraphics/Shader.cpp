@@ -18,9 +18,9 @@ VShader::~VShader() = default;
 
 const char* VShader::Header(bool i_bOpenGLES)
 {
-	// The precision is set twice over: in GLSL 1.20 the macro is not defined, and there are no precisions.
+	// In GLSL 1.20 the number is that of the directive's own line, so that the text begins at 1 in both.
 	return i_bOpenGLES ? "#version 100\n#ifdef GL_ES\nprecision mediump float;\n#endif\n#line 1\n"
-	                   : "#version 120\n#ifdef GL_ES\nprecision mediump float;\n#endif\n#line 1\n";
+	                   : "#version 120\n#ifdef GL_ES\nprecision mediump float;\n#endif\n#line 0\n";
 }
 
 void VShader::Compile()

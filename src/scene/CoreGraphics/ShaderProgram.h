@@ -53,8 +53,12 @@ public:
 	QOpenGLShaderProgram* Get() const { return m_pProgram.get(); }
 	/// -1 if this program does not use it.
 	int UniformLocation(EStandardUniform i_Uniform) const { return m_UniformLocations[i_Uniform]; }
-	/// -1 if this program does not use it.
-	int AttributeLocation(EAttribute i_Attribute) const { return m_AttributeLocations[i_Attribute]; }
+	/// @param i_Attribute EAttribute
+	/// @return -1 if this program does not use it, or if there is no such attribute
+	int AttributeLocation(std::size_t i_Attribute) const
+	{
+		return i_Attribute < EAttributeCount ? m_AttributeLocations[i_Attribute] : -1;
+	}
 	/// Of any uniform, looked up by name: once per step at most, see VUniform. -1 if this program does not use it.
 	int GetUniformLocation(const char* i_pName) const;
 

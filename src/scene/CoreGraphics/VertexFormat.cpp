@@ -31,4 +31,25 @@ const VVertexFormat& VVertexFormat::PositionNormal()
 	return s_Format;
 }
 
+const VVertexFormat& VVertexFormat::Mesh()
+{
+	static const VVertexFormat s_Format{{{EAttributePosition, 3, 0, GL_FLOAT, 0},
+	                                        {EAttributeNormal, 3, 0, GL_FLOAT, 12}, {EAttributeUV, 2, 0, GL_FLOAT, 24}},
+	    32};
+	return s_Format;
+}
+
+const VVertexFormat& VVertexFormat::Skin()
+{
+	static const VVertexFormat s_Format = []
+	{
+		VVertexFormat format = Mesh();
+		format.m_Entries.push_back({EAttributeBoneIndices, 4, 0, GL_UNSIGNED_BYTE, 32});
+		format.m_Entries.push_back({EAttributeBoneWeights, 4, 1, GL_UNSIGNED_BYTE, 36});
+		format.m_Stride = 40;
+		return format;
+	}();
+	return s_Format;
+}
+
 } // namespace CoreGraphics

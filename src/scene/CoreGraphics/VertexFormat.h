@@ -52,6 +52,10 @@ struct VVertexFormat
 	static const VVertexFormat& PositionColour();
 	/// 3 floats of position, 3 floats of normal.
 	static const VVertexFormat& PositionNormal();
+	/// 3 floats of position, 3 floats of normal, 2 floats of texture coordinate: FBXIO::VBasicVertex.
+	static const VVertexFormat& Mesh();
+	/// As Mesh, then 4 bytes of bone indices, and 4 bytes of weights as parts of 255: FBXIO::VSkinVertex.
+	static const VVertexFormat& Skin();
 };
 
 } // namespace CoreGraphics

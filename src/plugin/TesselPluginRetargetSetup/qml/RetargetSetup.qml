@@ -65,22 +65,22 @@ Rectangle {
 		onActivated: retargetSetup.addTarget(false)
 	}
 
-	FileDialog {
+	OrlexFileDialog {
 		id: loadDialog
 		objectName: "loadDialog"
 		title: "Choose a file"
-		folder: ContextRetargetsUrl
+		startFolder: ContextRetargetsUrl
 		nameFilters: ["Subject files (*.qrr)", "Legacy subject files (*.qrx)"]
 		onAccepted: {
 			if (fileUrls.length === 1)
 				ContextRetargetSetup.LoadTargetSubjectURL(fileUrls[0])
 		}
 	}
-	FileDialog {
+	OrlexFileDialog {
 		id: saveDialog
 		objectName: "saveDialog"
 		title: "Choose a file"
-		folder: ContextRetargetsUrl
+		startFolder: ContextRetargetsUrl
 		nameFilters: ["Subject files (*.qrr)"]
 		selectExisting: false
 		defaultSuffix: "qrr"

@@ -1,5 +1,6 @@
 import QtQuick 2.15
 import QtQuick.Templates 2.15 as T
+import Orlex.Controls 1.0
 import Orlex.Theme 1.0
 
 // Columns or rows whose borders can be dragged. Children say their size by SplitView's attached properties.
@@ -12,6 +13,7 @@ T.SplitView {
 	handle: Rectangle {
 		implicitWidth: 6
 		implicitHeight: 6
+		Component.onCompleted: Ownership.giveTo(this, control)
 		color: T.SplitHandle.pressed ? Theme.active : T.SplitHandle.hovered ? Theme.border : Theme.dark
 
 		Rectangle {

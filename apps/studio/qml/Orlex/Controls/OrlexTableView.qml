@@ -13,6 +13,9 @@ FocusScope {
 	property var columns: []
 	property string selectionRole: "selectionItem"
 	property alias currentIndex: list.currentIndex
+	// The row that is selected, wherever that was done: it comes into view, and the keys go on from it. -1 for none and
+	// for several.
+	property int selectedIndex: -1
 	readonly property alias count: list.count
 	readonly property alias view: list
 	// What stands in the middle of a table without rows.
@@ -42,6 +45,13 @@ FocusScope {
 		for (let i = 0; i < column; ++i)
 			before += columns[i].share
 		return shares > 0 ? Math.round(columnsWidth * before / shares) : 0
+	}
+
+	onSelectedIndexChanged: {
+		if (selectedIndex < 0 || selectedIndex >= list.count)
+			return
+		list.currentIndex = selectedIndex
+		list.positionViewAtIndex(selectedIndex, ListView.Contain)
 	}
 
 	implicitWidth: 300

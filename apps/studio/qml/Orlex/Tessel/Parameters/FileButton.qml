@@ -1,5 +1,4 @@
 import QtQuick 2.15
-import QtQuick.Dialogs 1.3
 import Orlex.Controls 1.0
 import TesselQML 1.0
 
@@ -26,17 +25,15 @@ OrlexButton {
 	Accessible.name: row ? row.label + ": " + toolTip : ""
 	onClicked: {
 		dialog.active = true
-		dialog.item.open()
-		// Behind the opening: a dialog that opens for the first time forgets the folder that it was given.
 		const first = row.valueText.split(";")[0]
-		if (first !== "")
-			dialog.item.folder = access === folder ? Tessel.fileUrl(first) : Tessel.folderUrl(first)
+		dialog.item.startFolder = access === folder ? Tessel.fileUrl(first) : Tessel.folderUrl(first)
+		dialog.item.open()
 	}
 
 	Loader {
 		id: dialog
 		active: false
-		sourceComponent: FileDialog {
+		sourceComponent: OrlexFileDialog {
 			title: button.toolTip
 			selectFolder: button.access === button.folder
 			selectExisting: button.access !== button.save

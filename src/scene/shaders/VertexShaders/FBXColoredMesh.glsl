@@ -1,0 +1,37 @@
+// A mesh whose vertices have colours.
+#ifdef GL_ES
+precision highp float;
+#endif
+
+uniform mat4 u_ViewProjection;
+uniform vec3 u_CameraPosition;
+uniform mat4 u_ModelTransform;
+
+attribute vec3 a_position;
+attribute vec3 a_normal;
+attribute vec2 a_uv;
+attribute vec4 a_colour;
+
+varying vec4 v_Colour;
+varying vec3 v_Normal;
+varying vec3 v_Eye;
+varying vec2 v_UV;
+
+// Normals keep at right angles to their faces under any scale: the matrix of the cofactors.
+vec3 ToWorld(mat4 i_Model, vec3 i_Normal)
+{
+	vec3 x = i_Model[0].xyz;
+	vec3 y = i_Model[1].xyz;
+	vec3 z = i_Model[2].xyz;
+	return cross(y, z) * i_Normal.x + cross(z, x) * i_Normal.y + cross(x, y) * i_Normal.z;
+}
+
+void main()
+{
+	vec4 position = u_ModelTransform * vec4(a_position, 1.0);
+	v_Colour = a_colour;
+	v_Normal = ToWorld(u_ModelTransform, a_normal);
+	v_Eye = position.xyz - u_CameraPosition;
+	v_UV = a_uv;
+	gl_Position = u_ViewProjection * position;
+}

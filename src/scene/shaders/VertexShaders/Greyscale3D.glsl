@@ -1,0 +1,21 @@
+// On the sensor of a camera that stands in the scene, a plane at unit distance that the model's transform places.
+#ifdef GL_ES
+precision highp float;
+#endif
+
+uniform mat4 u_ViewProjection;
+uniform mat4 u_ModelTransform;
+uniform vec2 u_SensorSize;
+
+attribute vec2 a_position;
+// The brightness of the pixel, in all channels.
+attribute vec4 a_colour;
+
+varying vec4 v_Colour;
+
+void main()
+{
+	v_Colour = a_colour;
+	vec2 position = a_position / u_SensorSize - 0.5;
+	gl_Position = u_ViewProjection * (u_ModelTransform * vec4(position, 0.0, 1.0));
+}

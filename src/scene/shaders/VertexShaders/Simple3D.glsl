@@ -1,0 +1,13 @@
+// In world space.
+#ifdef GL_ES
+precision highp float;
+#endif
+
+uniform mat4 u_ViewProjection;
+
+attribute vec3 a_position;
+
+void main()
+{
+	gl_Position = u_ViewProjection * vec4(a_position, 1.0);
+}

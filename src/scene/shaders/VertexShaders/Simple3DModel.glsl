@@ -1,0 +1,27 @@
+// In the space of a model, with its normal.
+#ifdef GL_ES
+precision highp float;
+#endif
+
+uniform mat4 u_ViewProjection;
+uniform mat4 u_ModelTransform;
+
+attribute vec3 a_position;
+attribute vec3 a_normal;
+
+varying vec3 v_Normal;
+
+// Normals keep at right angles to their faces under any scale: the matrix of the cofactors.
+vec3 ToWorld(mat4 i_Model, vec3 i_Normal)
+{
+	vec3 x = i_Model[0].xyz;
+	vec3 y = i_Model[1].xyz;
+	vec3 z = i_Model[2].xyz;
+	return cross(y, z) * i_Normal.x + cross(z, x) * i_Normal.y + cross(x, y) * i_Normal.z;
+}
+
+void main()
+{
+	v_Normal = ToWorld(u_ModelTransform, a_normal);
+	gl_Position = u_ViewProjection * (u_ModelTransform * vec4(a_position, 1.0));
+}

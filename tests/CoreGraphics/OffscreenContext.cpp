@@ -1,0 +1,57 @@
+#include "OffscreenContext.h"
+
+#include <QGuiApplication>
+#include <QSurfaceFormat>
+
+#include <memory>
+
+namespace GraphicsTest
+{
+
+namespace
+{
+
+/// Windows and contexts need the application; it ends with the last test.
+class VApplication : public testing::Environment
+{
+public:
+	void SetUp() override { m_pApplication = std::make_unique<QGuiApplication>(m_Count, m_pArguments); }
+	void TearDown() override { m_pApplication.reset(); }
+
+private:
+	char m_Name[5] = "test";
+	char* m_pArguments[2] = {m_Name, nullptr};
+	int m_Count = 1;
+	std::unique_ptr<QGuiApplication> m_pApplication;
+};
+
+[[maybe_unused]] testing::Environment* const g_pApplication = testing::AddGlobalTestEnvironment(new VApplication);
+
+} // namespace
+
+VOffscreenContext::VOffscreenContext(EDialect i_Dialect, QOpenGLContext* i_pShare)
+{
+	QSurfaceFormat format;
+	format.setRenderableType(i_Dialect == EDialect::ES2 ? QSurfaceFormat::OpenGLES : QSurfaceFormat::OpenGL);
+	format.setVersion(2, i_Dialect == EDialect::ES2 ? 0 : 1);
+	format.setDepthBufferSize(24);
+	m_Surface.setFormat(format);
+	m_Surface.create();
+	m_Context.setFormat(format);
+	m_Context.setShareContext(i_pShare);
+	EXPECT_TRUE(m_Context.create());
+	EXPECT_TRUE(m_Context.makeCurrent(&m_Surface));
+	EXPECT_EQ(m_Context.isOpenGLES(), i_Dialect == EDialect::ES2);
+}
+
+VOffscreenContext::~VOffscreenContext()
+{
+	m_Context.doneCurrent();
+}
+
+std::string DialectName(const testing::TestParamInfo<EDialect>& i_rInfo)
+{
+	return i_rInfo.param == EDialect::ES2 ? "ES2" : "Desktop";
+}
+
+} // namespace GraphicsTest

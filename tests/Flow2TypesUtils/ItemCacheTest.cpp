@@ -1,0 +1,153 @@
+#include "CoreOrlexTypes/Subject.h"
+#include "DebugServices/Assert.h"
+#include "Flow2TypesUtils/FlowParametersItem.h"
+#include "Flow2TypesUtils/ParameterSet.h"
+#include "Flow2TypesUtils/TaggedCoreTypeExtractor.h"
+#include "InMemoryHost/PluginContext.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using namespace Flow2TypesUtils;
+using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectParametrised;
+using NVX::CountedPointer;
+using TesselPluginInterface::IFlowFrame;
+using TesselPluginInterface::IFlowItem;
+
+/// The expressions of the assertions that fail while this lives.
+class VAssertRecorder
+{
+public:
+	VAssertRecorder() : m_pBefore(DebugServices::SetAssertFailHandler(Note)) { s_Failed.clear(); }
+	~VAssertRecorder() { DebugServices::SetAssertFailHandler(m_pBefore); }
+	static std::string Take() { return std::exchange(s_Failed, {}); }
+
+private:
+	static void Note(const char* i_pExpression, const char*, int) { s_Failed += i_pExpression; }
+	static inline std::string s_Failed;
+	const DebugServices::VAssertFailHandler m_pBefore;
+};
+
+class ItemCache : public testing::Test
+{
+protected:
+	template <typename T>
+	CountedPointer<IFlowItem> Item(const char* i_pFlowType, std::shared_ptr<const T> i_pValue)
+	{
+		auto pItem = m_Host.GetItemFactory()->CreateItem(i_pFlowType);
+		EXPECT_TRUE(TesselPluginInterface::SetItemValue(pItem, std::move(i_pValue)));
+		return pItem;
+	}
+
+	CountedPointer<IFlowFrame> Frame(std::initializer_list<CountedPointer<IFlowItem>> i_Items)
+	{
+		auto pFrame = m_Host.GetFrameFactory()->CreateFrame();
+		for (const auto& rpItem : i_Items)
+			pFrame->AddItem(rpItem);
+		return pFrame;
+	}
+
+	InMemoryHost::VPluginContext m_Host;
+};
+
+TEST_F(ItemCache, FollowsTheItemOfItsType)
+{
+	const auto pSubject = std::make_shared<const VSubject>();
+	const auto pItem = Item("FlowSubject", pSubject);
+	VItemCacheTyped<VSubject> cache("FlowSubject");
+	EXPECT_FALSE(cache.GetValue() || cache.GetItem() || cache.Update(*Frame({}))) << "nothing came yet";
+	EXPECT_TRUE(cache.Update(*Frame({Item("FlowSubjectForSolving", std::make_shared<const VSubject>()), pItem})));
+	EXPECT_EQ(cache.Value(), pSubject);
+	EXPECT_EQ(cache.GetItem(), pItem);
+	EXPECT_EQ(cache.Generation(), 1u);
+
+	EXPECT_FALSE(cache.Update(*Frame({pItem}))) << "the same item in another frame";
+	EXPECT_FALSE(cache.Update(*Frame({}))) << "a frame without one leaves the latest";
+	EXPECT_EQ(cache.Value(), pSubject);
+
+	EXPECT_TRUE(cache.Update(*Frame({Item("FlowSubject", pSubject)}))) << "another item, though of the same value";
+	EXPECT_EQ(cache.Generation(), 2u);
+	cache.Reset();
+	EXPECT_FALSE(cache.GetValue() || cache.GetItem());
+	EXPECT_TRUE(cache.Update(*Frame({pItem})));
+	EXPECT_EQ(cache.Generation(), 3u);
+}
+
+TEST_F(ItemCache, OwnsItsItemSoThatNoOtherTakesItsPlace)
+{
+	VItemCacheTyped<VSubject> cache("FlowSubject");
+	for (std::uint64_t i = 1; i <= 50; ++i)
+	{
+		EXPECT_TRUE(cache.Update(*Frame({Item("FlowSubject", std::make_shared<const VSubject>())})));
+		EXPECT_EQ(cache.Generation(), i);
+	}
+}
+
+TEST_F(ItemCache, AnItemWithoutAValueHasNone)
+{
+	VItemCacheTyped<VSubject> cache("FlowSubject");
+	cache.Update(*Frame({Item("FlowSubject", std::make_shared<const VSubject>())}));
+	EXPECT_TRUE(cache.Update(*Frame({m_Host.GetItemFactory()->CreateItem("FlowSubject")})));
+	EXPECT_FALSE(cache.GetValue());
+	m_Host.ItemFactory().Register<int>("FlowSubject");
+	EXPECT_TRUE(cache.Update(*Frame({Item("FlowSubject", std::make_shared<const int>(1))})));
+	EXPECT_FALSE(cache.GetValue()) << "the host's item carries something else";
+}
+
+TEST_F(ItemCache, HoldsParametersToo)
+{
+	auto pParameters = std::make_shared<Flow2Utils::VParameterSet>();
+	auto pParameter = std::make_unique<Flow2Utils::VParameterTyped<std::uint32_t>>("PoseIndex");
+	pParameter->Set(3);
+	pParameters->Add(std::move(pParameter));
+	auto pValue = std::make_shared<FlowParametersItem>();
+	pValue->m_pParameters = pParameters;
+	VItemCacheTyped<FlowParametersItem> cache(FlowParametersItem::c_pName);
+	EXPECT_TRUE(cache.Update(*Frame({Item<FlowParametersItem>("FlowParametersItem", pValue)})));
+	EXPECT_EQ(cache.Value()->m_pParameters->Value<std::uint32_t>("PoseIndex", 0), 3u);
+	EXPECT_STREQ(
+	    FlowParametersItem::c_pDocumentation, "Parameters that can be tagged and addressed to a particular target");
+}
+
+TEST_F(ItemCache, TheExtractorAsksByTag)
+{
+	VAssertRecorder asserts;
+	VTaggedCoreTypeExtractor extractor;
+	EXPECT_FALSE(extractor.Insert(4100)) << "no such type";
+	EXPECT_TRUE(extractor.Insert(4114) && extractor.Insert(4122));
+	const auto pSubject = std::make_shared<const VSubject>();
+	const auto pFrame =
+	    Frame({Item("FlowSubject", pSubject), Item("FlowSubjectForSolving", std::make_shared<const VSubject>())});
+	EXPECT_EQ(extractor.Get(4114), nullptr);
+	EXPECT_TRUE(extractor.Update(*pFrame));
+	EXPECT_FALSE(extractor.Update(*pFrame));
+	EXPECT_EQ(extractor.Get<VSubject>(4114), pSubject);
+	EXPECT_EQ(extractor.Get(4122), nullptr) << "inserted, but nothing came";
+	EXPECT_TRUE(extractor.Insert(4114));
+	EXPECT_EQ(extractor.Get(4114), pSubject) << "inserting again keeps the item";
+	EXPECT_EQ(extractor.Cache(4114)->Generation(), 1u);
+	EXPECT_EQ(asserts.Take(), "");
+
+	extractor.Reset();
+	EXPECT_EQ(extractor.Get(4114), nullptr);
+	EXPECT_TRUE(extractor.Update(*pFrame));
+	EXPECT_EQ(asserts.Take(), "");
+}
+
+TEST_F(ItemCache, ATagThatWasNeverInsertedFailsTheAssertion)
+{
+	VAssertRecorder asserts;
+	VTaggedCoreTypeExtractor extractor;
+	extractor.Insert(4114);
+	EXPECT_EQ(extractor.Get(4123), nullptr);
+	EXPECT_EQ(asserts.Take(), "It != m_ItemCacheMap.end()");
+	EXPECT_EQ(extractor.Get<VSubject>(4123), nullptr);
+	EXPECT_EQ(asserts.Take(), "It != m_ItemCacheMap.end()");
+	EXPECT_EQ(extractor.Get<VSubjectParametrised>(4114), nullptr);
+	EXPECT_EQ(asserts.Take(), "pTyped != nullptr");
+}
+
+} // namespace
