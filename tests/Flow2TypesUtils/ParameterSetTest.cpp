@@ -163,7 +163,7 @@ TEST_F(ParameterSet, WhenAnItemIsAppliedAgainRows)
 {
 	const auto pFirst = Item(2.0);
 	/// Its parameters differ, so that an application shows.
-	const auto other = [&pFirst](std::uint64_t i_Identity, std::uint64_t i_Revision)
+	const auto other = [](std::uint64_t i_Identity, std::uint64_t i_Revision)
 	{
 		const auto pItem = Item(5.0);
 		pItem->m_Identity = i_Identity;
