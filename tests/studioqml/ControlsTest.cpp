@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <QAccessible>
 #include <QFileInfo>
 #include <QQmlPropertyMap>
 #include <QSignalSpy>
@@ -97,6 +98,16 @@ TEST(Button, ClicksTogglesAndKeys)
 	EXPECT_EQ(page.FocusName(), "check");
 	EXPECT_TRUE(page.Property("check", "visualFocus").toBool());
 	page.Key(Qt::Key_Space);
+	EXPECT_FALSE(page.Property("check", "checked").toBool());
+
+	// As a screen reader presses them.
+	const auto act = [&page](const char* i_pItem, const QString& i_rAction)
+	{ QAccessible::queryAccessibleInterface(page.Item(i_pItem))->actionInterface()->doAction(i_rAction); };
+	act("plain", "Press");
+	EXPECT_EQ(pRoot->property("clicks").toInt(), 3);
+	act("check", "Toggle");
+	EXPECT_TRUE(page.Property("check", "checked").toBool());
+	act("check", "Press");
 	EXPECT_FALSE(page.Property("check", "checked").toBool());
 
 	// What is disabled, checked or at rest looks different.

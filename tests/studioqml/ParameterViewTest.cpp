@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include <QAccessible>
 #include <QApplication>
 #include <QFileDialog>
 #include <QLineEdit>
@@ -422,4 +423,49 @@ TEST(ParameterView, TabWalksThroughTheFields)
 	EXPECT_EQ(visited, (QStringList{"ScaleReset", "WeightSlider", "Weight", "Root", "elsewhere"}));
 	page.m_Page.Key(Qt::Key_Backtab);
 	EXPECT_EQ(page.m_Page.FocusName(), "Root");
+}
+
+TEST(ParameterView, EveryControlHasAnAccessibleName)
+{
+	VParameterPage page(
+	    {Scale(), Weight("3"), {.m_Name = "Root", .m_EnumNames = {"a", "b"}}, {.m_Name = "Flag", .m_Type = "bool"},
+	        {.m_Name = "Option", .m_Type = "bool", .m_PresentationHint = ECheckableOption},
+	        {.m_Name = "Note", .m_PresentationHint = ECheckableOption},
+	        {.m_Name = "Notes", .m_PresentationHint = EMultiLine},
+	        {.m_Name = "Colour", .m_Value = "#fff", .m_PresentationHint = EColour},
+	        {.m_Name = "File", .m_FileAccess = 3}, {.m_Name = "Deep", .m_bAdvanced = true}});
+	ASSERT_TRUE(page.m_bShown);
+	const struct
+	{
+		const char* m_pItem;
+		QAccessible::Role m_Role;
+		const char* m_pName;
+	} rows[] = {{"view", QAccessible::Grouping, "view"}, {"Scale", QAccessible::EditableText, "Scale"},
+	    {"ScaleReset", QAccessible::Button, "Scale: back to the default"},
+	    {"Weight", QAccessible::EditableText, "Weight"}, {"WeightSlider", QAccessible::Slider, "Weight"},
+	    {"Root", QAccessible::ComboBox, "Root"}, {"Flag", QAccessible::CheckBox, "Flag"},
+	    {"Option", QAccessible::CheckBox, "Option"}, {"NoteSwitch", QAccessible::CheckBox, "Note is set"},
+	    {"Notes", QAccessible::EditableText, "Notes"}, {"ColourSwatch", QAccessible::Button, "Colour: choose a colour"},
+	    {"Colour", QAccessible::EditableText, "Colour"}, {"FileBrowse", QAccessible::Button, "File: Choose a file"},
+	    {"viewAdvanced", QAccessible::CheckBox, "Advanced"}};
+	for (const auto& rRow : rows)
+	{
+		QAccessibleInterface* const pInterface = QAccessible::queryAccessibleInterface(page.m_Page.Item(rRow.m_pItem));
+		ASSERT_TRUE(pInterface) << rRow.m_pItem;
+		EXPECT_EQ(pInterface->role(), rRow.m_Role) << rRow.m_pItem;
+		EXPECT_EQ(pInterface->text(QAccessible::Name).toStdString(), rRow.m_pName) << rRow.m_pItem;
+	}
+	// As a screen reader presses it.
+	const auto act = [&page](const char* i_pItem, const QString& i_rAction)
+	{ QAccessible::queryAccessibleInterface(page.m_Page.Item(i_pItem))->actionInterface()->doAction(i_rAction); };
+	act("Flag", "Press");
+	EXPECT_EQ(page.m_Model.Text("Flag"), "true");
+	act("Flag", "Toggle");
+	EXPECT_EQ(page.m_Model.Text("Flag"), "false");
+	act("ScaleReset", "Press");
+	EXPECT_EQ(page.m_Model.Text("Scale"), "1");
+	act("viewAdvanced", "Press");
+	EXPECT_TRUE(page.m_Page.Has("Deep"));
+	act("Root", "Press");
+	EXPECT_TRUE(page.m_Page.Has("RootList"));
 }

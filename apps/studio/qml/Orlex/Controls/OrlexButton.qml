@@ -18,7 +18,19 @@ T.Button {
 	Accessible.description: toolTip
 	Accessible.checkable: checkable
 	Accessible.checked: checked
-	Accessible.onPressAction: click()
+	Accessible.onToggleAction: act()
+	Accessible.onPressAction: act()
+
+	// What a click does.
+	function act() {
+		if (!enabled)
+			return
+		if (checkable) {
+			toggle()
+			toggled()
+		}
+		clicked()
+	}
 
 	contentItem: Text {
 		id: caption
@@ -44,13 +56,10 @@ T.Button {
 		}
 	}
 
-	Loader {
-		active: control.hovered && (control.toolTip !== "" || caption.truncated)
-		sourceComponent: OrlexToolTip {
-			parent: control
-			visible: !control.down
-			text: caption.truncated && control.toolTip !== "" ? control.text + "\n" + control.toolTip
-				: caption.truncated ? control.text : control.toolTip
-		}
+	HoverTip {
+		hovered: control.hovered && !control.down
+		cut: caption.truncated
+		whole: control.text
+		toolTip: control.toolTip
 	}
 }

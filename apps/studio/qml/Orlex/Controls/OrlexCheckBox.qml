@@ -16,8 +16,17 @@ T.CheckBox {
 	Accessible.name: text
 	Accessible.description: toolTip
 	Accessible.checked: checked
-	Accessible.onToggleAction: click()
-	Accessible.onPressAction: click()
+	Accessible.onToggleAction: act()
+	Accessible.onPressAction: act()
+
+	// What a click does; the default of these actions tells nobody.
+	function act() {
+		if (!enabled)
+			return
+		toggle()
+		toggled()
+		clicked()
+	}
 
 	indicator: Rectangle {
 		x: control.leftPadding
@@ -66,13 +75,10 @@ T.CheckBox {
 		elide: Text.ElideRight
 	}
 
-	Loader {
-		active: control.hovered && (control.toolTip !== "" || caption.truncated)
-		sourceComponent: OrlexToolTip {
-			parent: control
-			visible: !control.down
-			text: caption.truncated && control.toolTip !== "" ? control.text + "\n" + control.toolTip
-				: caption.truncated ? control.text : control.toolTip
-		}
+	HoverTip {
+		hovered: control.hovered && !control.down
+		cut: caption.truncated
+		whole: control.text
+		toolTip: control.toolTip
 	}
 }

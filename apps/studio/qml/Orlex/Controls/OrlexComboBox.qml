@@ -5,7 +5,7 @@ import Orlex.Theme 1.0
 
 // Picks one of a list of texts. A long list can be filtered by typing: an entry stays if it holds every word typed, in
 // any case. Leading spaces of an entry indent it.
-T.Control {
+Item {
 	id: control
 
 	// A list of texts.
@@ -20,6 +20,7 @@ T.Control {
 	property bool filterable: count > 12
 	property bool invalid: false
 	property color textColor: Theme.text
+	readonly property alias hovered: mouse.containsMouse
 	readonly property alias popup: popup
 
 	// The operator picked an entry; currentIndex is it already.
@@ -45,12 +46,9 @@ T.Control {
 
 	implicitWidth: 140
 	implicitHeight: Theme.controlHeight
-	leftPadding: 6
-	rightPadding: 4
-	font.pixelSize: Theme.fontSize
-	focusPolicy: Qt.StrongFocus
-	hoverEnabled: true
+	activeFocusOnTab: true
 	Accessible.role: Accessible.ComboBox
+	Accessible.focusable: true
 	Accessible.name: placeholderText
 	Accessible.description: displayText
 	Accessible.onPressAction: open("")
@@ -74,15 +72,20 @@ T.Control {
 			event.accepted = false
 	}
 
-	background: FieldFrame {
-		focused: control.visualFocus || popup.visible
+	FieldFrame {
+		anchors.fill: parent
+		focused: control.activeFocus || popup.visible
 		hovered: control.hovered
 		invalid: control.invalid
 		color: !control.enabled ? Theme.window : popup.visible ? Theme.base : Theme.button
 	}
 
-	contentItem: MouseArea {
-		acceptedButtons: Qt.LeftButton
+	MouseArea {
+		id: mouse
+		anchors.fill: parent
+		anchors.leftMargin: 6
+		anchors.rightMargin: 4
+		hoverEnabled: true
 		onPressed: {
 			control.forceActiveFocus(Qt.MouseFocusReason)
 			if (popup.visible)
@@ -99,7 +102,7 @@ T.Control {
 			height: parent.height
 			text: control.displayText !== "" ? control.displayText : control.placeholderText
 			textFormat: Text.PlainText
-			font: control.font
+			font.pixelSize: Theme.fontSize
 			color: !control.enabled || control.displayText === "" ? Theme.disabledText : control.textColor
 			verticalAlignment: Text.AlignVCenter
 			elide: Text.ElideMiddle
@@ -120,14 +123,11 @@ T.Control {
 		}
 	}
 
-	Loader {
-		active: control.hovered && !popup.visible && (control.toolTip !== "" || caption.truncated)
-		sourceComponent: OrlexToolTip {
-			parent: control
-			visible: true
-			text: caption.truncated && control.toolTip !== "" ? control.displayText + "\n" + control.toolTip
-				: caption.truncated ? control.displayText : control.toolTip
-		}
+	HoverTip {
+		hovered: control.hovered && !popup.visible
+		cut: caption.truncated
+		whole: control.displayText
+		toolTip: control.toolTip
 	}
 
 	onModelChanged: if (popup.visible) popup.refill()
@@ -154,8 +154,14 @@ T.Control {
 			list.currentIndex = found.length > 0 ? Math.max(0, found.indexOf(before)) : -1
 			list.positionViewAtIndex(list.currentIndex, ListView.Contain)
 		}
-		// Below the box, or above it where there is more room.
+		// Wide enough for the longest entry. Below the box, or above it where there is more room.
 		function place() {
+			let longest = ""
+			for (let i = 0; i < control.count; ++i)
+				if (control.model[i].length > longest.length)
+					longest = control.model[i]
+			width = Math.min(control.Window.width - 2 * margins, Math.max(control.width, control.filterable ? 220 : 0,
+				Math.ceil(metrics.advanceWidth(longest.trim())) + 7 * (longest.length - longest.trim().length) + 50))
 			const box = control.mapToItem(null, 0, 0)
 			const room = control.Window.height
 			const below = room - box.y - control.height - 6
@@ -165,8 +171,11 @@ T.Control {
 			y = up ? -height - 2 : control.height + 2
 		}
 
+		readonly property FontMetrics metrics: FontMetrics {
+			font.pixelSize: Theme.fontSize
+		}
+
 		objectName: control.objectName + "Popup"
-		width: Math.max(control.width, control.filterable ? 260 : 0)
 		margins: 2
 		padding: 1
 		focus: true
@@ -271,7 +280,7 @@ T.Control {
 						width: parent.width - x - 12 - entryMark.width - 4
 						height: parent.height
 						text: entry.name
-						color: Theme.text
+						color: modelData === control.currentIndex ? Theme.bright : Theme.text
 					}
 					SideMark {
 						id: entryMark

@@ -15,7 +15,8 @@ T.AbstractButton {
 	Accessible.name: text
 	Accessible.checkable: true
 	Accessible.checked: checked
-	Accessible.onPressAction: click()
+	Accessible.onToggleAction: toggle()
+	Accessible.onPressAction: toggle()
 
 	contentItem: Item {
 		Chevron {

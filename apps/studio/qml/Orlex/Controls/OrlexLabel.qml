@@ -23,13 +23,10 @@ Text {
 		id: hover
 		enabled: label.ownToolTip
 	}
-	Loader {
-		active: hover.hovered && (label.truncated || label.toolTip !== "")
-		sourceComponent: OrlexToolTip {
-			parent: label
-			visible: true
-			text: label.truncated && label.toolTip !== "" ? label.text + "\n" + label.toolTip
-				: label.truncated ? label.text : label.toolTip
-		}
+	HoverTip {
+		hovered: hover.hovered
+		cut: label.truncated
+		whole: label.text
+		toolTip: label.toolTip
 	}
 }

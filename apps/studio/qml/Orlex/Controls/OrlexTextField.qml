@@ -44,14 +44,10 @@ T.TextField {
 		elide: Text.ElideRight
 	}
 
-	Loader {
-		active: control.hovered && !control.activeFocus
-			&& (control.toolTip !== "" || control.contentWidth > control.availableWidth)
-		sourceComponent: OrlexToolTip {
-			parent: control
-			visible: true
-			text: control.contentWidth > control.availableWidth
-				? control.text + (control.toolTip !== "" ? "\n" + control.toolTip : "") : control.toolTip
-		}
+	HoverTip {
+		hovered: control.hovered && !control.activeFocus
+		cut: control.contentWidth > control.availableWidth
+		whole: control.text
+		toolTip: control.toolTip
 	}
 }
