@@ -1,0 +1,144 @@
+#include "FBXIO/FBXReader.h"
+
+#include "MeshFile.h"
+#include "TestLog.h"
+
+#include <QImage>
+
+#include <gtest/gtest.h>
+
+#include <boost/filesystem/operations.hpp>
+
+#include <fstream>
+
+using namespace FBXIO;
+using namespace FbxTest;
+
+namespace
+{
+
+/// A folder that ends with its scope, for a file and its textures.
+class Material : public testing::TestWithParam<VTestForm>
+{
+protected:
+	Material() : m_Folder(boost::filesystem::temp_directory_path() / boost::filesystem::unique_path())
+	{
+		boost::filesystem::create_directories(m_Folder / "maps");
+		m_pSink = NVX::GlobalLog::AddSink(
+		    [this](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rText)
+		    {
+			    if (i_rCategory.Name() == "Import" && i_Level == NVX::ELogError)
+				    m_Failed.push_back(i_rText);
+		    });
+	}
+	~Material() override { boost::filesystem::remove_all(m_Folder); }
+
+	std::string Path(const std::string& i_rName) const { return (m_Folder / i_rName).string(); }
+
+	/// A picture of this width.
+	void WritePicture(const std::string& i_rName, int i_Width) const
+	{
+		ASSERT_TRUE(QImage(i_Width, 1, QImage::Format_RGB32).save(QString::fromStdString(Path(i_rName)), "PNG"));
+	}
+
+	/// The parts of a triangle with these materials.
+	std::vector<VMeshPart> Read(const std::vector<VTestMaterial>& i_rMaterials)
+	{
+		const VTestScene scene{{{"body", "Mesh", -1, {}}}, {}, {}, {}};
+		std::ofstream(Path("hero.fbx"), std::ios::binary) << Write(GetParam(), scene,
+		    {{0, {0, 0, 0, 1, 0, 0, 0, 1, 0}, {0, 1, -3}, {}, {}, {"AllSame", "IndexToDirect", {}, {0}}, i_rMaterials,
+		        {}}});
+		FBXReader reader;
+		EXPECT_TRUE(reader.LoadFile(Path("hero.fbx")));
+		VBasicMesh mesh;
+		reader.ReadTopMesh(mesh);
+		return mesh.m_Parts;
+	}
+
+	boost::filesystem::path m_Folder;
+	std::vector<std::string> m_Failed;
+	std::shared_ptr<void> m_pSink;
+};
+
+INSTANTIATE_TEST_SUITE_P(
+    Forms, Material, testing::ValuesIn(c_Forms), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
+
+TEST_P(Material, ColoursByClass)
+{
+	const std::vector<std::pair<std::string, VNumbers>> all{{"EmissiveColor", {0.1, 0.2, 0.3}},
+	    {"EmissiveFactor", {0.5}}, {"AmbientColor", {0.4, 0.5, 0.6}}, {"AmbientFactor", {0.25}},
+	    {"DiffuseColor", {0.7, 0.8, 0.9}}, {"DiffuseFactor", {0.75}}, {"TransparentColor", {1, 1, 1}},
+	    {"TransparencyFactor", {0.125}}, {"SpecularColor", {0.2, 0.4, 0.6}}, {"SpecularFactor", {2}},
+	    {"ShininessExponent", {20}}, {"ReflectionColor", {0.3, 0.6, 0.9}}, {"ReflectionFactor", {0.375}}};
+	const std::vector<VMeshPart> parts =
+	    Read({{"phong", all, "", ""}, {"Lambert", all, "", ""}, {"blinn", all, "", ""}});
+	ASSERT_EQ(parts.size(), 3u);
+	for (const VMeshPart* const pPart : {&parts[0], &parts[1]})
+	{
+		EXPECT_EQ(pPart->m_Emissive, QVector4D(0.1f, 0.2f, 0.3f, 0.5f));
+		EXPECT_EQ(pPart->m_Ambient, QVector4D(0.4f, 0.5f, 0.6f, 0.25f));
+		EXPECT_EQ(pPart->m_Diffuse, QVector4D(0.7f, 0.8f, 0.9f, 0.75f));
+		EXPECT_EQ(pPart->m_Transparent, QVector4D(1, 1, 1, 0.125f));
+	}
+	EXPECT_EQ(parts[0].m_Specular, QVector4D(0.2f, 0.4f, 0.6f, 2));
+	EXPECT_EQ(parts[0].m_Shininess, 20.0f);
+	EXPECT_EQ(parts[0].m_Reflection, QVector4D(0.3f, 0.6f, 0.9f, 0.375f));
+	EXPECT_EQ(parts[1].m_Specular, QVector4D());
+	EXPECT_EQ(parts[1].m_Shininess, 0.0f);
+	EXPECT_EQ(parts[2].m_Diffuse, QVector4D(1.0f, 0.8f, 0.8f, 1.0f)) << "of a class that is not known: as it was";
+	EXPECT_EQ(parts[2].m_Emissive, QVector4D());
+}
+
+TEST_P(Material, TexturesAreLookedForInTurn)
+{
+	WritePicture("maps/skin.png", 1);
+	WritePicture("relative.png", 2);
+	WritePicture("skin.png", 3);
+	const std::string absolute = Path("maps/skin.png");
+	const struct
+	{
+		const char* m_pName;
+		std::string m_FileName;
+		std::string m_RelativeName;
+		/// Which picture, 0 for none; where it was looked for last.
+		int m_Width;
+		std::string m_Path;
+	} rows[]{{"as it stands", absolute, "relative.png", 1, absolute},
+	    {"relative", "/nowhere/skin.png", "relative.png", 2, Path("relative.png")},
+	    {"relative, into a folder", "/nowhere/other.png", "maps\\skin.png", 1, Path("maps/skin.png")},
+	    {"beside the file", "/nowhere/skin.png", "gone.png", 3, Path("skin.png")},
+	    {"of another system", "C:\\art\\skin.png", "", 3, Path("skin.png")},
+	    {"nowhere", "/nowhere/lost.png", "gone.png", 0, Path("lost.png")},
+	    {"no picture", Path("hero.fbx"), "", 0, Path("hero.fbx")}, {"none", "", "", 0, ""}};
+	for (const auto& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		m_Failed.clear();
+		const VTestMaterial material{"lambert", {}, rRow.m_FileName, rRow.m_RelativeName};
+		const std::vector<VMeshPart> parts = Read({material, material});
+		ASSERT_EQ(parts.size(), 2u);
+		EXPECT_EQ(parts[0].m_pTexture ? parts[0].m_pTexture->width() : 0, rRow.m_Width);
+		EXPECT_EQ(parts[0].m_TexturePath, rRow.m_Path);
+		EXPECT_EQ(parts[0].m_pTexture, parts[1].m_pTexture) << "one image for both";
+		std::vector<std::string> failed;
+		if (rRow.m_Width == 0 && !rRow.m_Path.empty())
+			failed = {"Failed to load " + rRow.m_Path};
+		if (!m_Failed.empty())
+			m_Failed.resize(1);
+		EXPECT_EQ(m_Failed, failed);
+	}
+}
+
+TEST_P(Material, OfAnUnknownClassHasNoTexture)
+{
+	WritePicture("skin.png", 3);
+	const std::vector<VMeshPart> parts =
+	    Read({{"blinn", {}, Path("skin.png"), ""}, {"phong", {}, Path("skin.png"), ""}});
+	ASSERT_EQ(parts.size(), 2u);
+	EXPECT_EQ(parts[0].m_pTexture, nullptr);
+	ASSERT_NE(parts[1].m_pTexture, nullptr);
+	EXPECT_EQ(parts[1].m_pTexture->width(), 3);
+	EXPECT_TRUE(m_Failed.empty());
+}
+
+} // namespace

@@ -1,0 +1,179 @@
+#include "MeshFile.h"
+
+#include <algorithm>
+
+using namespace FbxTest;
+
+namespace
+{
+
+VTestRecord Record(const char* i_pName, std::vector<VTestValue> i_Values)
+{
+	return {i_pName, std::move(i_Values), {}};
+}
+
+/// Adds objects and their connections, by numbers or by names.
+class VObjects
+{
+public:
+	VObjects(const VTestForm& i_rForm, const VTestScene& i_rScene)
+	    : m_rScene(i_rScene), m_bNew(i_rForm.m_Version >= 7000), m_Records(Records(i_rForm, i_rScene))
+	{
+	}
+
+	bool IsNew() const { return m_bNew; }
+	std::vector<VTestRecord>& All() { return m_Records; }
+
+	VTestValue NodeKey(int i_Node) const
+	{
+		return m_bNew ? VTestValue(std::int64_t(i_Node + 1)) : VTestValue("Model::" + m_rScene.m_Nodes[i_Node].m_Name);
+	}
+
+	/// The record of a node.
+	VTestRecord& Node(int i_Node)
+	{
+		const std::string name = "Model::" + m_rScene.m_Nodes[i_Node].m_Name;
+		auto& rObjects = Top("Objects").m_Children;
+		return *std::find_if(rObjects.begin(), rObjects.end(),
+		    [&](const VTestRecord& i_rRecord) {
+			    return i_rRecord.m_Name == "Model" && std::get<std::string>(i_rRecord.m_Values[m_bNew ? 1 : 0]) == name;
+		    });
+	}
+
+	/// @return what connections name the object by.
+	VTestValue Add(
+	    const char* i_pClass, const std::string& i_rName, const char* i_pKind, std::vector<VTestRecord> i_Children)
+	{
+		const std::string name = std::string(i_pClass) + "::" + i_rName;
+		VTestRecord object = Record(i_pClass, {name, std::string(i_pKind)});
+		const std::int64_t id = 2'000'000 + m_Count++;
+		if (m_bNew)
+			object.m_Values.insert(object.m_Values.begin(), id);
+		object.m_Children = std::move(i_Children);
+		Top("Objects").m_Children.push_back(std::move(object));
+		return m_bNew ? VTestValue(id) : VTestValue(name);
+	}
+
+	void Connect(VTestValue i_Child, VTestValue i_Parent, const char* i_pProperty = nullptr)
+	{
+		VTestRecord connection = Record(m_bNew ? "C" : "Connect",
+		    {std::string(i_pProperty ? "OP" : "OO"), std::move(i_Child), std::move(i_Parent)});
+		if (i_pProperty)
+			connection.m_Values.push_back(std::string(i_pProperty));
+		Top("Connections").m_Children.push_back(std::move(connection));
+	}
+
+private:
+	VTestRecord& Top(const char* i_pName)
+	{
+		return *std::find_if(m_Records.begin(), m_Records.end(),
+		    [&](const VTestRecord& i_rRecord) { return i_rRecord.m_Name == i_pName; });
+	}
+
+	const VTestScene& m_rScene;
+	bool m_bNew;
+	std::vector<VTestRecord> m_Records;
+	std::int64_t m_Count = 0;
+};
+
+void AddLayer(std::vector<VTestRecord>& io_rGeometry, const char* i_pName, const char* i_pDirect, const char* i_pIndex,
+    const VTestLayer& i_rLayer)
+{
+	if (i_rLayer.m_Mapping.empty())
+		return;
+	VTestRecord layer = Record(i_pName, {std::int64_t(0)});
+	layer.m_Children = {Record("MappingInformationType", {i_rLayer.m_Mapping}),
+	    Record("ReferenceInformationType", {i_rLayer.m_Reference})};
+	if (*i_pDirect)
+		layer.m_Children.push_back(Record(i_pDirect, {i_rLayer.m_Direct}));
+	if (!i_rLayer.m_Index.empty())
+		layer.m_Children.push_back(Record(i_pIndex, {i_rLayer.m_Index}));
+	io_rGeometry.push_back(std::move(layer));
+}
+
+VTestRecord Properties(bool i_bNew, const std::vector<std::pair<std::string, VNumbers>>& i_rProperties)
+{
+	VTestRecord list = Record(i_bNew ? "Properties70" : "Properties60", {});
+	for (const auto& [name, numbers] : i_rProperties)
+	{
+		std::vector<VTestValue> values{name, std::string("Color"), std::string()};
+		if (i_bNew)
+			values.push_back(std::string("A"));
+		values.insert(values.end(), numbers.begin(), numbers.end());
+		list.m_Children.push_back(Record(i_bNew ? "P" : "Property", std::move(values)));
+	}
+	return list;
+}
+
+void AddMaterials(VObjects& io_rObjects, const VTestMesh& i_rMesh)
+{
+	for (std::size_t i = 0; i < i_rMesh.m_Materials.size(); ++i)
+	{
+		const VTestMaterial& rMaterial = i_rMesh.m_Materials[i];
+		const std::string name = std::to_string(i_rMesh.m_Node) + '-' + std::to_string(i);
+		const VTestValue key = io_rObjects.Add("Material", "material" + name, "",
+		    {Record("ShadingModel", {rMaterial.m_ShadingModel}),
+		        Properties(io_rObjects.IsNew(), rMaterial.m_Properties)});
+		io_rObjects.Connect(key, io_rObjects.NodeKey(i_rMesh.m_Node));
+		if (rMaterial.m_FileName.empty() && rMaterial.m_RelativeName.empty())
+			continue;
+		const VTestValue texture = io_rObjects.Add("Texture", "texture" + name, "TextureVideoClip",
+		    {Record("FileName", {rMaterial.m_FileName}), Record("RelativeFilename", {rMaterial.m_RelativeName})});
+		if (io_rObjects.IsNew())
+			io_rObjects.Connect(texture, key, "DiffuseColor");
+		else
+			io_rObjects.Connect(texture, io_rObjects.NodeKey(i_rMesh.m_Node));
+	}
+}
+
+} // namespace
+
+std::string FbxTest::Write(
+    const VTestForm& i_rForm, const VTestScene& i_rScene, const std::vector<VTestMesh>& i_rMeshes)
+{
+	VObjects objects(i_rForm, i_rScene);
+	for (const VTestMesh& rMesh : i_rMeshes)
+	{
+		const VTestValue node = objects.NodeKey(rMesh.m_Node);
+		const std::string& rName = i_rScene.m_Nodes[rMesh.m_Node].m_Name;
+		std::vector<VTestRecord> geometry{
+		    Record("Vertices", {rMesh.m_Points}), Record("PolygonVertexIndex", {rMesh.m_Polygons})};
+		AddLayer(geometry, "LayerElementNormal", "Normals", "NormalsIndex", rMesh.m_Normals);
+		AddLayer(geometry, "LayerElementUV", "UV", "UVIndex", rMesh.m_UV);
+		AddLayer(geometry, "LayerElementMaterial", "", "Materials", rMesh.m_MaterialLayer);
+		VTestValue owner = node;
+		if (objects.IsNew())
+		{
+			owner = objects.Add("Geometry", rName + "Shape", "Mesh", std::move(geometry));
+			objects.Connect(owner, node);
+		}
+		else
+		{
+			auto& rChildren = objects.Node(rMesh.m_Node).m_Children;
+			rChildren.insert(rChildren.end(), geometry.begin(), geometry.end());
+		}
+		AddMaterials(objects, rMesh);
+		if (rMesh.m_Clusters.empty())
+			continue;
+		const VTestValue skin = objects.Add("Deformer", "skin of " + rName, "Skin", {});
+		objects.Connect(skin, owner);
+		for (std::size_t i = 0; i < rMesh.m_Clusters.size(); ++i)
+		{
+			const VTestCluster& rCluster = rMesh.m_Clusters[i];
+			std::vector<VTestRecord> children;
+			if (!rCluster.m_Points.empty())
+				children = {Record("Indexes", {rCluster.m_Points}), Record("Weights", {rCluster.m_Weights})};
+			for (const auto& [pName, rMatrix] :
+			    {std::pair<const char*, const VNumbers&>{"Transform", rCluster.m_Transform},
+			        {"TransformLink", rCluster.m_Link}})
+				if (!rMatrix.empty())
+					children.push_back(Record(pName, {rMatrix}));
+			const VTestValue cluster =
+			    objects.Add("Deformer", rName + " cluster" + std::to_string(i), "Cluster", std::move(children));
+			objects.Connect(cluster, skin);
+			if (rCluster.m_Node >= 0)
+				objects.Connect(objects.NodeKey(rCluster.m_Node), cluster);
+		}
+	}
+	return Write(i_rForm, objects.All());
+}
