@@ -7,6 +7,7 @@
 #include "OrlexGraphics/RenderCameras.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/SphereHelper.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 
 #include <QPointer>
@@ -47,6 +48,8 @@ VOrlexScene::~VOrlexScene()
 void VOrlexScene::InitialiseGL()
 {
 	m_pShaderLibrary->InitialiseGL();
+	if (!m_pSphereHelper)
+		m_pSphereHelper = std::make_shared<VSphereHelper>(*m_pShaderLibrary, m_pRegistry);
 }
 
 void VOrlexScene::Refresh()

@@ -33,6 +33,7 @@ class IRenderType;
 class VRenderCameras;
 class VSelectionRegistry;
 class VSkinCache;
+class VSphereHelper;
 struct VItemPlaces;
 
 /// What a SceneFramebufferObject shows: lists of what draws itself, in the order of drawing, and what the mouse can
@@ -120,6 +121,8 @@ public:
 	const std::vector<std::shared_ptr<IRenderType>>& PostList() const { return m_PostList; }
 	/// Null in a scene without cameras.
 	const std::shared_ptr<VRenderCameras>& CameraType() const { return m_pCameraType; }
+	/// Null before InitialiseGL.
+	const std::shared_ptr<VSphereHelper>& SphereHelper() const { return m_pSphereHelper; }
 	VSelectionRegistry& Registry() const { return *m_pRegistry; }
 	CoreGraphics::VShaderLibrary& ShaderLibrary() const { return *m_pShaderLibrary; }
 
@@ -148,6 +151,7 @@ protected:
 	/// Of the render thread.
 	VOverlay m_Overlay;
 	const std::shared_ptr<VSelectionRegistry> m_pRegistry;
+	std::shared_ptr<VSphereHelper> m_pSphereHelper;
 	std::shared_ptr<IManipulator> m_pManipulator;
 	std::shared_ptr<IManipulator> m_pReconstructionVolumeManipulator;
 	std::shared_ptr<IManipulator> m_pHotspotVolumeManipulator;

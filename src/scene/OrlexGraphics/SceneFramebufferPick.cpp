@@ -2,6 +2,7 @@
 #include "OrlexGraphics/SceneFramebufferRenderer.h"
 #include "OrlexGraphics/SelectionKinds.h"
 #include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/SphereHelper.h"
 
 #include <QColor>
 #include <QOpenGLFramebufferObject>
@@ -66,6 +67,7 @@ void VSceneFramebufferRenderer::ReadIds(const QRect& i_rRectangle)
 	rGL.glEnable(GL_SCISSOR_TEST);
 	rGL.glScissor(i_rRectangle.x(), i_rRectangle.y(), i_rRectangle.width(), i_rRectangle.height());
 	m_Context.ClearBuffers(true, true);
+	m_pScene->SphereHelper()->Clear();
 	if (!m_Options.m_bCameraView)
 		RenderPasses();
 	m_Context.ReadPixels(i_rRectangle, m_Pixels);
@@ -105,7 +107,8 @@ void VSceneFramebufferRenderer::PickRect(
 	{
 		const std::size_t before = m_PickedIds.size();
 		ReadIds(rectangle);
-		if (!CollectIds(m_Pixels.data(), m_Pixels.size() / 4, m_Found, m_PickedIds))
+		const bool bPixels = CollectIds(m_Pixels.data(), m_Pixels.size() / 4, m_Found, m_PickedIds);
+		if (!m_pScene->SphereHelper()->PickRectangle(rectangle, scaled, m_Found, m_PickedIds) && !bPixels)
 			break;
 		std::for_each(m_PickedIds.begin() + static_cast<std::ptrdiff_t>(before), m_PickedIds.end(),
 		    [&](std::uint32_t i_Id) { rRegistry.Exclude(i_Id); });

@@ -5,6 +5,7 @@
 #include "OrlexGraphics/RenderCameras.h"
 #include "OrlexGraphics/SceneFramebufferObject.h"
 #include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/SphereHelper.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 
 #include <QColor>
@@ -243,6 +244,7 @@ void VSceneFramebufferRenderer::RenderScene()
 	m_Context.ClearBuffers(true, true);
 	if (!m_pScene)
 		return;
+	m_pScene->SphereHelper()->Clear();
 	// Camera views consist of tiles; there are none here.
 	if (!m_Options.m_bCameraView)
 		RenderPasses();
