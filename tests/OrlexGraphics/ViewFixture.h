@@ -1,16 +1,17 @@
 #pragma once
 
+#include "CoreGraphics/CameraController.h"
+#include "CoreGraphics/SelectableProgram.h"
 #include "CoreGraphics/ShaderLibrary.h"
+#include "CoreGraphics/Shapes.h"
+#include "Flow2Graphics/FlowScene.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/OrlexScene.h"
+#include "OrlexGraphics/IRenderType.h"
 #include "OrlexGraphics/SceneFramebufferObject.h"
 #include "TesselPluginInterface/IDispatcher.h"
 
 #include <QImage>
-#include <QQuickItem>
 #include <QQuickWidget>
-#include <QSignalSpy>
-#include <QTest>
 #include <gtest/gtest.h>
 
 #include <functional>
@@ -28,35 +29,92 @@ private:
 	QObject m_Context;
 };
 
-/// A window with one view, 200 by 160 pixels, of a scene.
+/// A box that faces the eye of the front view.
+struct VBox
+{
+	NVX::ISelectionItem m_Item;
+	/// Pixels of the view.
+	QRectF m_Place;
+	/// Millimetres towards the eye.
+	float m_Height = 0.0f;
+	QVector4D m_Colour{0.0f, 0.0f, 1.0f, 1.0f};
+	std::uint32_t m_Pass = OrlexGraphics::EPassOpaque;
+	std::string m_Name;
+};
+
+/// Of boxes, and nothing else.
+class VBoxScene : public Flow2Graphics::VFlowScene
+{
+public:
+	using VFlowScene::VFlowScene;
+
+	void InitialiseGL() override;
+	void Refresh() override;
+
+	std::vector<VBox> m_Boxes;
+	/// Of the view.
+	QSize m_Size;
+	bool m_bUp = false;
+	int m_Refreshes = 0;
+	using VFlowScene::m_bExactPick;
+	using VFlowScene::m_bFrameYUp;
+	using VFlowScene::m_Overlay;
+	using VFlowScene::m_pManipulator;
+};
+
+/// A window with one view, 200 by 160 pixels, from the front, of a scene of boxes.
 class VViewTest : public testing::Test
 {
 protected:
 	static constexpr int c_Width = 200;
 	static constexpr int c_Height = 160;
 
-	void Show(std::shared_ptr<OrlexGraphics::VOrlexScene> i_pScene)
-	{
-		m_pScene = std::move(i_pScene);
-		m_pWidget = std::make_unique<QQuickWidget>();
-		m_pWidget->setResizeMode(QQuickWidget::SizeRootObjectToView);
-		m_pView = new OrlexGraphics::VSceneFramebufferObject;
-		m_pView->SetScene(m_pScene.get());
-		m_pWidget->setContent(QUrl(), nullptr, m_pView);
-		m_pWidget->resize(c_Width, c_Height);
-		m_pWidget->show();
-		ASSERT_TRUE(QTest::qWaitForWindowExposed(m_pWidget.get()));
-	}
+	VViewTest();
+	~VViewTest() override;
+
+	void Show();
+	void Show(const std::shared_ptr<OrlexGraphics::VOrlexScene>& i_rpScene);
 
 	/// Runs the event loop until it holds.
-	static bool Until(const std::function<bool()>& i_rCondition) { return QTest::qWaitFor(i_rCondition, 10000); }
+	static bool Until(const std::function<bool()>& i_rCondition);
+	QImage Grab() { return m_pWidget->grabFramebuffer(); }
+
+	void Mouse(QEvent::Type i_Type, const QPoint& i_rPos, Qt::MouseButton i_Button, Qt::MouseButtons i_Buttons,
+	    Qt::KeyboardModifiers i_Modifiers = {});
+	void Hover(const QPoint& i_rPos) { Mouse(QEvent::MouseMove, i_rPos, Qt::NoButton, Qt::NoButton); }
+	void Press(const QPoint& i_rPos, Qt::KeyboardModifiers i_Modifiers = {})
+	{
+		Mouse(QEvent::MouseButtonPress, i_rPos, Qt::LeftButton, Qt::LeftButton, i_Modifiers);
+	}
+	void Drag(const QPoint& i_rPos, Qt::KeyboardModifiers i_Modifiers = {})
+	{
+		Mouse(QEvent::MouseMove, i_rPos, Qt::NoButton, Qt::LeftButton, i_Modifiers);
+	}
+	void Release(const QPoint& i_rPos, Qt::KeyboardModifiers i_Modifiers = {})
+	{
+		Mouse(QEvent::MouseButtonRelease, i_rPos, Qt::LeftButton, Qt::NoButton, i_Modifiers);
+	}
+	void Click(const QPoint& i_rPos, Qt::KeyboardModifiers i_Modifiers = {})
+	{
+		Press(i_rPos, i_Modifiers);
+		Release(i_rPos, i_Modifiers);
+	}
+	/// Waits until a click or a rectangle has been committed.
+	bool Commit();
+
+	/// What is selected, by element index.
+	std::vector<std::uint32_t> Selected() const;
+	std::vector<std::uint32_t> Preselected() const;
 
 	const std::shared_ptr<VEventLoopDispatcher> m_pDispatcher = std::make_shared<VEventLoopDispatcher>();
 	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
 	    std::make_shared<InMemoryHost::VSelectionManager>();
 	const std::shared_ptr<CoreGraphics::VShaderLibrary> m_pShaders = std::make_shared<CoreGraphics::VShaderLibrary>();
-	std::shared_ptr<OrlexGraphics::VOrlexScene> m_pScene;
+	std::shared_ptr<CoreGraphics::VInteractionMapper> m_pMapper;
+	std::shared_ptr<VBoxScene> m_pScene;
 	std::unique_ptr<QQuickWidget> m_pWidget;
 	/// The widget owns it.
 	OrlexGraphics::VSceneFramebufferObject* m_pView = nullptr;
 };
+
+NVX::ISelectionItem Item(std::uint32_t i_Index, std::uint32_t i_Kind = NVX::ESelectionTargetSegment);

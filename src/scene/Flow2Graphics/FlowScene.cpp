@@ -1,5 +1,6 @@
 #include "Flow2Graphics/FlowScene.h"
 
+#include "OrlexGraphics/RenderOutlines.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 
 namespace Flow2Graphics
@@ -11,6 +12,13 @@ void VFlowScene::SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame>
 {
 	m_pPendingFrame = std::move(i_pFrame);
 	RequestRefresh();
+}
+
+void VFlowScene::InitialiseGL()
+{
+	VOrlexScene::InitialiseGL();
+	if (m_PostList.empty())
+		m_PostList.push_back(std::make_shared<OrlexGraphics::VRenderOutlines>(*m_pShaderLibrary, m_pRegistry));
 }
 
 bool VFlowScene::Synchronise()

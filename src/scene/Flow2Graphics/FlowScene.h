@@ -19,6 +19,7 @@ public:
 	/// What is to be shown from the next exchange on. User interface thread.
 	void SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame);
 
+	void InitialiseGL() override;
 	bool Synchronise() override;
 	/// The frame update.
 	void Refresh() override;

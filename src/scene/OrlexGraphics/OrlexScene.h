@@ -54,7 +54,8 @@ public:
 	    bool i_bAllowHiddenPick);
 	~VOrlexScene() override;
 
-	/// On the render thread with the context current, while the user interface thread waits; again for each renderer.
+	/// On the render thread with the context current, while the user interface thread waits; for each renderer that
+	/// begins to show the scene. Sees to the shaders, and to the render lists when they are still empty.
 	virtual void InitialiseGL();
 	/// The frame update, on the render thread.
 	virtual void Refresh();
@@ -114,6 +115,7 @@ public:
 	// For the render thread.
 
 	bool NeedsRefresh() const { return m_bNeedsRefresh; }
+	void SetNeedsRefresh() { m_bNeedsRefresh = true; }
 	/// As the frame update has it.
 	bool FrameYUp() const { return m_bFrameYUp; }
 	bool ExactPick() const { return m_bExactPick; }

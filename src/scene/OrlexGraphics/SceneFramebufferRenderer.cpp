@@ -86,9 +86,10 @@ void VSceneFramebufferRenderer::TakeScene(VSceneFramebufferObject& io_rItem)
 		m_Tracked.clear();
 		if (m_pScene)
 		{
+			// The base's own, whatever an override leaves out: another context may have come.
+			m_pScene->VOrlexScene::InitialiseGL();
 			m_pScene->InitialiseGL();
-			// What other renderers drew of it was drawn with ids and places of theirs.
-			m_pScene->RequestRefresh();
+			m_pScene->SetNeedsRefresh();
 		}
 	}
 	if (m_pScene)

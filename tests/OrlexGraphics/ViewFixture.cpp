@@ -1,0 +1,186 @@
+#include "ViewFixture.h"
+
+#include "CoreGraphics/RenderContext.h"
+#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/TesselInteractionMapper.h"
+
+#include <QMouseEvent>
+#include <QQuickItem>
+#include <QTest>
+
+namespace
+{
+
+class VBoxes : public OrlexGraphics::IRenderType
+{
+public:
+	VBoxes(CoreGraphics::VShaderLibrary& io_rLibrary, std::shared_ptr<OrlexGraphics::VSelectionRegistry> i_pRegistry)
+	    : m_pRegistry(std::move(i_pRegistry)),
+	      m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, "Simple3DModelColour", "Colour"))
+	{
+		m_State.m_bDepthTest = true;
+		m_SelectionState = CoreGraphics::MakeSelectionState(m_State);
+	}
+
+	void Update(const std::vector<VBox>& i_rBoxes, const QSize& i_rView)
+	{
+		constexpr float c_Scale = 4.0f;
+		m_Drawn.clear();
+		CoreGraphics::VCameraController front;
+		front.m_Type = CoreGraphics::ECameraFront;
+		const QMatrix4x4 toWorld = front.Orientation().inverted();
+		for (const VBox& rBox : i_rBoxes)
+		{
+			const QPointF centre = rBox.m_Place.center() - QPointF(0.5 * i_rView.width(), 0.5 * i_rView.height());
+			const QVector3D eye(
+			    c_Scale * static_cast<float>(centre.x()), -c_Scale * static_cast<float>(centre.y()), rBox.m_Height);
+			VDrawn drawn;
+			drawn.m_Id = rBox.m_Item.m_Kind == 0 ? CoreGraphics::VSelectionId() : m_pRegistry->GetId(rBox.m_Item);
+			if (!rBox.m_Name.empty())
+				m_pRegistry->Allocate(rBox.m_Item, rBox.m_Name);
+			drawn.m_Transform = toWorld;
+			drawn.m_Transform.translate(eye);
+			drawn.m_Transform.scale(c_Scale * static_cast<float>(rBox.m_Place.width()),
+			    c_Scale * static_cast<float>(rBox.m_Place.height()), 1.0f);
+			drawn.m_Colour = rBox.m_Colour;
+			drawn.m_Pass = rBox.m_Pass;
+			const float radius =
+			    0.5f * c_Scale * static_cast<float>(std::hypot(rBox.m_Place.width(), rBox.m_Place.height())) + 1.0f;
+			m_pRegistry->SetItemBound(rBox.m_Item, QVector4D(toWorld.map(eye), radius));
+			m_pRegistry->SetItemMatrix(rBox.m_Item, drawn.m_Transform);
+			m_Drawn.push_back(drawn);
+		}
+	}
+
+	void Render(CoreGraphics::VRenderContext& io_rContext, const OrlexGraphics::VSceneOptions& /*i_rOptions*/,
+	    std::uint32_t i_Pass) override
+	{
+		const bool bSelection = io_rContext.m_Mode != CoreGraphics::ERenderNormal;
+		if (!io_rContext.UseProgram(m_Program.Get(bSelection)))
+			return;
+		io_rContext.ApplyState(bSelection ? m_SelectionState : m_State);
+		io_rContext.BindVertices(m_Box.m_Vertices);
+		for (const VDrawn& rDrawn : m_Drawn)
+		{
+			if (rDrawn.m_Pass != i_Pass
+			    || (bSelection && (rDrawn.m_Id.m_Id == 0 || m_pRegistry->IsHidden(rDrawn.m_Id, io_rContext.m_Mode))))
+				continue;
+			if (bSelection)
+				m_Program.SetId(io_rContext, rDrawn.m_Id);
+			io_rContext.SetUniform(m_ModelTransform, rDrawn.m_Transform);
+			io_rContext.SetUniform(m_ModelColour, rDrawn.m_Colour);
+			io_rContext.DrawElements(GL_TRIANGLES, m_Box.m_Indices);
+		}
+	}
+
+private:
+	struct VDrawn
+	{
+		QMatrix4x4 m_Transform;
+		QVector4D m_Colour;
+		CoreGraphics::VSelectionId m_Id;
+		std::uint32_t m_Pass = 0;
+	};
+
+	const std::shared_ptr<OrlexGraphics::VSelectionRegistry> m_pRegistry;
+	CoreGraphics::VSelectableProgram m_Program;
+	CoreGraphics::VShape m_Box = CoreGraphics::MakeBox(false);
+	CoreGraphics::VUniform m_ModelTransform{"u_ModelTransform"};
+	CoreGraphics::VUniform m_ModelColour{"u_ModelColour"};
+	CoreGraphics::VRenderState m_State;
+	CoreGraphics::VRenderState m_SelectionState;
+	std::vector<VDrawn> m_Drawn;
+};
+
+std::vector<std::uint32_t> Indices(const std::vector<NVX::ISelectionItem>& i_rItems)
+{
+	std::vector<std::uint32_t> indices;
+	for (const NVX::ISelectionItem& rItem : i_rItems)
+		indices.push_back(rItem.m_ElementIndex);
+	return indices;
+}
+
+} // namespace
+
+NVX::ISelectionItem Item(std::uint32_t i_Index, std::uint32_t i_Kind)
+{
+	return {i_Kind, 0x0fffffff, i_Index, {}};
+}
+
+void VBoxScene::InitialiseGL()
+{
+	VFlowScene::InitialiseGL();
+	if (m_RenderList.empty())
+		m_RenderList.push_back(std::make_shared<VBoxes>(*m_pShaderLibrary, m_pRegistry));
+}
+
+void VBoxScene::Refresh()
+{
+	++m_Refreshes;
+	m_pRegistry->Reset();
+	static_cast<VBoxes&>(*m_RenderList.front()).Update(m_Boxes, m_Size);
+	VOrlexScene::Refresh();
+}
+
+VViewTest::VViewTest()
+{
+	m_pMapper = NVX::MakeShared<OrlexGraphics::VTesselInteractionMapper>(nullptr, m_pDispatcher);
+	CoreGraphics::VInteractionMapper::SetActive(m_pMapper);
+	m_pScene = std::make_shared<VBoxScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false);
+	m_pScene->m_Size = QSize(c_Width, c_Height);
+}
+
+VViewTest::~VViewTest()
+{
+	m_pWidget.reset();
+}
+
+void VViewTest::Show()
+{
+	Show(m_pScene);
+}
+
+void VViewTest::Show(const std::shared_ptr<OrlexGraphics::VOrlexScene>& i_rpScene)
+{
+	m_pWidget = std::make_unique<QQuickWidget>();
+	m_pWidget->setResizeMode(QQuickWidget::SizeRootObjectToView);
+	m_pView = new OrlexGraphics::VSceneFramebufferObject;
+	m_pView->SetScene(i_rpScene.get());
+	m_pView->SetCameraType(CoreGraphics::ECameraFront);
+	m_pWidget->setContent(QUrl(), nullptr, m_pView);
+	m_pWidget->resize(c_Width, c_Height);
+	m_pWidget->show();
+	ASSERT_TRUE(QTest::qWaitForWindowExposed(m_pWidget.get()));
+	ASSERT_TRUE(Until([&] { return m_pScene->m_Refreshes > 0 || i_rpScene != m_pScene; }));
+}
+
+bool VViewTest::Until(const std::function<bool()>& i_rCondition)
+{
+	return QTest::qWaitFor(i_rCondition, 10000);
+}
+
+void VViewTest::Mouse(QEvent::Type i_Type, const QPoint& i_rPos, Qt::MouseButton i_Button, Qt::MouseButtons i_Buttons,
+    Qt::KeyboardModifiers i_Modifiers)
+{
+	QMouseEvent event(i_Type, i_rPos, m_pWidget->mapToGlobal(i_rPos), i_Button, i_Buttons, i_Modifiers);
+	QCoreApplication::sendEvent(m_pWidget.get(), &event);
+}
+
+bool VViewTest::Commit()
+{
+	if (!Until([&] { return m_pView->MouseState() == OrlexGraphics::EMouseIdle; }))
+		return false;
+	// What was decided is posted.
+	QCoreApplication::processEvents();
+	return true;
+}
+
+std::vector<std::uint32_t> VViewTest::Selected() const
+{
+	return Indices(m_pSelection->Selection().Items());
+}
+
+std::vector<std::uint32_t> VViewTest::Preselected() const
+{
+	return Indices(m_pSelection->PreSelection().Items());
+}
