@@ -8,6 +8,8 @@
 #include <QQuickItem>
 #include <QTest>
 
+#include <cmath>
+
 namespace
 {
 
@@ -168,7 +170,12 @@ void VViewTest::Mouse(QEvent::Type i_Type, const QPoint& i_rPos, Qt::MouseButton
 
 bool VViewTest::Commit()
 {
-	if (!Until([&] { return m_pView->MouseState() == OrlexGraphics::EMouseIdle; }))
+	const auto isCommitted = [&]
+	{
+		return m_pView->MouseState() != OrlexGraphics::EMouseClicked
+		    && m_pView->MouseState() != OrlexGraphics::EMouseDragged;
+	};
+	if (!Until(isCommitted))
 		return false;
 	// What was decided is posted.
 	QCoreApplication::processEvents();

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "CoreGraphics/CameraController.h"
+#include "CoreGraphics/InteractionMapper.h"
 #include "CoreGraphics/SelectableProgram.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "CoreGraphics/Shapes.h"
@@ -39,7 +40,7 @@ struct VBox
 	float m_Height = 0.0f;
 	QVector4D m_Colour{0.0f, 0.0f, 1.0f, 1.0f};
 	std::uint32_t m_Pass = OrlexGraphics::EPassOpaque;
-	std::string m_Name;
+	std::string m_Name = {};
 };
 
 /// Of boxes, and nothing else.

@@ -4,6 +4,8 @@
 #include <QQmlPropertyMap>
 #include <QSignalSpy>
 
+#include <cmath>
+
 namespace
 {
 

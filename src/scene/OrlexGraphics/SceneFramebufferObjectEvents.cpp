@@ -166,10 +166,7 @@ void VSceneFramebufferObject::keyReleaseEvent(QKeyEvent* io_pEvent)
 
 void VSceneFramebufferObject::hoverEnterEvent(QHoverEvent* io_pEvent)
 {
-	m_MouseState = EMouseHovering;
-	SetModifiers(io_pEvent->modifiers());
-	SetMousePos(io_pEvent->pos());
-	update();
+	hoverMoveEvent(io_pEvent);
 }
 
 void VSceneFramebufferObject::hoverMoveEvent(QHoverEvent* io_pEvent)
