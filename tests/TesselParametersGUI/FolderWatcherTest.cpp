@@ -254,9 +254,10 @@ TEST_F(FolderWatcher, ThousandsOfFilesAreOneChange)
 	const auto pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
 	int changes = 0;
 	pParameter->ConnectAttributes([&] { ++changes; }, pDispatcher);
+	Put(m_Folder / "file", "");
 	for (int index = 0; index < 5000; ++index)
 	{
-		Put(m_Folder / ("User/" + std::to_string(index) + ".qrs"), "");
+		create_hard_link(m_Folder / "file", m_Folder / ("User/" + std::to_string(index) + ".qrs"));
 		Notice(*pParameter, m_Folder / "User");
 	}
 	EXPECT_EQ(m_Delay.Pass(), 1u);
