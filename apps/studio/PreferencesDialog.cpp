@@ -2,6 +2,7 @@
 
 #include "TesselPluginInterface/PathTypes.h"
 #include "UtilsFileSystem/InstalledProducts.h"
+#include "UtilsFileSystem/Paths.h"
 #include "studio/Named.h"
 #include "studio/Preferences.h"
 
@@ -107,7 +108,7 @@ void VPreferencesDialog::AddFolderRow(QGridLayout& io_rLayout, const std::string
 		            ? QString()
 		            : QStringLiteral("<span style=\"color:#e0ad4b\">%1</span>").arg(tr("not there")));
 	    });
-	pEdit->setText(QString::fromStdString(m_rPreferences.Folder(i_rKey).string()));
+	pEdit->setText(QString::fromStdString(UtilsFileSystem::ToUtf8(m_rPreferences.Folder(i_rKey))));
 	auto* const pBrowse =
 	    Named(new QToolButton, (i_rKey + "Browse").c_str(), tr("Choose the folder: %1").arg(i_rLabel));
 	pBrowse->setText(QStringLiteral("..."));
@@ -148,7 +149,8 @@ QWidget* VPreferencesDialog::NavigationPage()
 void VPreferencesDialog::Apply()
 {
 	for (const VFolderRow& rRow : m_Folders)
-		m_rPreferences.SetFolder(rRow.m_Key, rRow.m_pEdit->text().trimmed().toStdString());
+		m_rPreferences.SetFolder(
+		    rRow.m_Key, UtilsFileSystem::PathFromUtf8(rRow.m_pEdit->text().trimmed().toStdString()));
 	m_rPreferences.SetNumber(TesselPluginInterface::c_NavigationAltKey, m_pNavigationAlt->currentData().toInt());
 }
 

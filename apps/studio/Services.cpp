@@ -1,6 +1,7 @@
 #include "studio/Services.h"
 
 #include "CoreGraphics/ShaderLibrary.h"
+#include "OrlexGraphics/SkinCache.h"
 #include "TesselDataStore/DataStore.h"
 #include "TesselParametersGUI/ParameterGroupModel.h"
 
@@ -43,6 +44,7 @@ VQmlServices QmlServices(VPluginContext& i_rContext, VCommandRunner i_RunCommand
 VPluginGui::VPluginGui(
     QMainWindow& i_rWindow, VPluginContext& i_rContext, bool i_bDeveloper, VCommandRunner i_RunCommand)
     : m_pShaderLibrary(MakeShaderLibrary(i_bDeveloper)),
+      m_pSkinCache(NVX::MakeShared<OrlexGraphics::VSkinCache>(i_rContext.GetDispatcher())),
       m_pQuickEngine(std::make_shared<VQuickEngine>(i_bDeveloper, QmlServices(i_rContext, std::move(i_RunCommand)))),
       m_pPanelManager(new VPanelManager(i_rWindow))
 {
@@ -51,6 +53,7 @@ VPluginGui::VPluginGui(
 VPluginGui::~VPluginGui()
 {
 	m_pPanelManager->Clear();
+	m_pSkinCache->Dispose();
 }
 
 } // namespace StudioHost

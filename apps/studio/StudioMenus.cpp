@@ -1,6 +1,7 @@
 #include "studio/StudioWindow.h"
 
 #include "TesselPluginInterface/PathTypes.h"
+#include "UtilsFileSystem/Paths.h"
 #include "studio/FileKind.h"
 #include "studio/Named.h"
 #include "studio/PreferencesDialog.h"
@@ -126,7 +127,7 @@ void VStudioWindow::AskAndOpen(int i_Kind)
 		if (int(rRow.m_Kind) != i_Kind)
 			continue;
 		const char* const pKey = TesselPluginInterface::c_FolderKeys[rRow.m_Folder];
-		const QString folder = QString::fromStdString(m_pContext->Preferences().Folder(pKey).string());
+		const QString folder = QString::fromStdString(UtilsFileSystem::ToUtf8(m_pContext->Preferences().Folder(pKey)));
 		const QString file = QFileDialog::getOpenFileName(
 		    this, tr("Choose a file"), folder, DialogFilter(rRow.m_Kind) + QStringLiteral(";;") + tr("All files (*)"));
 		if (!file.isEmpty())
