@@ -208,6 +208,23 @@ TEST_P(Mesh, DamageIsToldAndLeftOut)
 	        {3, "1 control points of mesh body have coordinates that are no numbers; setting these to zero"}}));
 }
 
+TEST(MeshArrays, DamageIsToldAndLeavesTheMeshEmpty)
+{
+	std::string bytes = Write(c_Forms[1], OneMesh(), {{0, c_Square, c_Quad, {}, {}, c_OneMaterial, {}, {}}});
+	const std::string name = "PolygonVertexIndex";
+	// Behind the name stand the type, the count, the encoding and the length; then what is inflated.
+	bytes.at(bytes.find(name) + name.size() + 13) ^= 0x55;
+	const VTestFile file(bytes);
+	VTestLog log;
+	FBXReader reader;
+	ASSERT_TRUE(reader.LoadFile(file.Path()));
+	VBasicMesh mesh;
+	reader.ReadTopMesh(mesh);
+	EXPECT_TRUE(mesh.m_Vertices.empty());
+	EXPECT_EQ(Told(log),
+	    (VMessages{{3, "Array PolygonVertexIndex of bodyShape left out because it is damaged or too large"}}));
+}
+
 /// A strip of triangles over this many control points, of which the last is the last corner.
 VTestMesh Strip(std::size_t i_Points)
 {

@@ -140,4 +140,43 @@ INSTANTIATE_TEST_SUITE_P(Files, ReferenceFile,
         "ufbx_maya_transformed_skin_a6100"),
     [](const auto& i_rInfo) { return std::string(i_rInfo.param); });
 
+/// The others were saved with bones or meshes moved since they were bound.
+class FileInItsBindPose : public testing::TestWithParam<const char*>
+{
+};
+
+TEST_P(FileInItsBindPose, SkinnedPointsLieWhereTheMeshLies)
+{
+	FBXReader reader;
+	ASSERT_TRUE(reader.LoadFile(c_Folder + GetParam() + ".fbx"));
+	std::vector<VPlacedMesh> placed;
+	reader.ReadPlacedMeshes(placed);
+	VSkin skin;
+	reader.ReadSkin(skin);
+	ASSERT_EQ(skin.m_Meshes.size(), 1u);
+	ASSERT_EQ(placed.size(), 1u);
+	const std::vector<VSkinVertex>& rVertices = skin.m_Meshes[0].m_Vertices;
+	ASSERT_EQ(placed[0].m_Mesh.m_Vertices.size(), rVertices.size());
+	float worst = 0;
+	for (const VSkinVertex& rVertex : rVertices)
+	{
+		const auto& [x, y, z] = rVertex.m_Position;
+		QVector3D skinned;
+		float sum = 0;
+		for (int k = 0; k < 4; ++k)
+		{
+			const VSkinBone& rBone = (*skin.m_pSkeleton)[rVertex.m_BoneIndices[k]];
+			skinned += rVertex.m_BoneWeights[k] * (rBone.m_Global * rBone.m_InverseBind).map(QVector3D(x, y, z));
+			sum += rVertex.m_BoneWeights[k];
+		}
+		const QVector3D place = placed[0].m_Transform.map(QVector3D(x, y, z));
+		worst = std::max(worst, (skinned / sum).distanceToPoint(place));
+	}
+	EXPECT_LT(worst, 0.01f);
+}
+
+INSTANTIATE_TEST_SUITE_P(Files, FileInItsBindPose,
+    testing::Values("own_game_zup_m_b7400", "own_ns_yup_cm_a7400", "own_ns_yup_cm_b7400", "pab_arnaud_b7500"),
+    [](const auto& i_rInfo) { return std::string(i_rInfo.param); });
+
 } // namespace

@@ -179,6 +179,15 @@ TEST_P(Skin, SkeletonIsOfUsedBonesWithAllAboveAndBelow)
 	EXPECT_TRUE((*m_pFull)[3].m_InverseBind.isIdentity());
 }
 
+TEST_P(Skin, ClustersOfUnevenListsKeepThePairs)
+{
+	const VTestScene scene{{{"root", "LimbNode", -1, {}}, {"body", "Mesh", -1, {}}}, {}, {}, {}};
+	const VSkin skin = Read(scene, {Triangle(1, {{0, {0, 1, 2}, {1, 1}, {}, {}}})});
+	EXPECT_EQ(m_Messages,
+	    (VMessages{{3, "Cluster body cluster0 has 3 indices and 2 weights; the rest is left out"}, c_Unweighted[0]}));
+	EXPECT_EQ(skin.m_Meshes.at(0).m_Vertices[1].m_BoneWeights, (VBytes{255, 0, 0, 0}));
+}
+
 TEST_P(Skin, MeshesWithoutSkinAreNoPartOfIt)
 {
 	const VTestScene scene{{{"root", "LimbNode", -1, {}}, {"body", "Mesh", -1, {}}}, {}, {}, {}};
