@@ -126,6 +126,7 @@ TEST(Button, ToolTipUnderTheMouse)
 	ASSERT_TRUE(page.Show(R"(
 		OrlexButton { objectName: "button"; x: 20; y: 100; text: "Text"; toolTip: "What it does" }
 		OrlexLabel { objectName: "label"; x: 20; y: 200; width: 80; text: "Character1:LeftForeArmTwist_L" }
+		OrlexLabel { objectName: "long"; x: 20; y: 300; width: 80; text: "A long word, and another, ".repeat(6) }
 		OrlexLabel { objectName: "short"; x: 20; y: 250; width: 80; text: "Short" })"));
 	const auto shows = [&page](const QString& i_rText)
 	{
@@ -140,8 +141,17 @@ TEST(Button, ToolTipUnderTheMouse)
 	page.Hover("label");
 	EXPECT_EVENTUALLY(shows("Character1:LeftForeArmTwist_L"));
 	EXPECT_EVENTUALLY(!shows("What it does"));
+	page.Hover("long");
+	EXPECT_EVENTUALLY(shows(page.Property("long", "text").toString()));
+	for (const QObject* pObject : page.View().contentItem()->findChildren<QObject*>())
+		if (pObject->inherits("QQuickToolTip") && pObject->property("visible").toBool())
+		{
+			// Wrapped, and within the window.
+			EXPECT_LT(pObject->property("width").toDouble(), 400);
+			EXPECT_GT(pObject->property("height").toDouble(), 40);
+		}
 	page.Hover("short");
-	EXPECT_EVENTUALLY(!shows("Character1:LeftForeArmTwist_L"));
+	EXPECT_EVENTUALLY(!shows(page.Property("long", "text").toString()));
 	EXPECT_FALSE(shows("Short"));
 }
 

@@ -10,7 +10,7 @@ T.ToolTip {
 
 	x: parent ? Math.round((parent.width - implicitWidth) / 2) : 0
 	y: -implicitHeight - 4
-	implicitWidth: contentItem.implicitWidth + leftPadding + rightPadding
+	implicitWidth: Math.min(widest, Math.ceil(contentItem.implicitWidth)) + leftPadding + rightPadding
 	implicitHeight: contentItem.implicitHeight + topPadding + bottomPadding
 	margins: 4
 	padding: 5
@@ -20,17 +20,11 @@ T.ToolTip {
 	closePolicy: T.Popup.CloseOnEscape | T.Popup.CloseOnPressOutsideParent | T.Popup.CloseOnReleaseOutsideParent
 
 	contentItem: Text {
-		// The text's own width asks a text of its own, since a wrapped one tells what it was given.
-		readonly property TextMetrics metrics: TextMetrics {
-			font: control.contentItem.font
-			text: control.text
-		}
 		text: control.text
 		textFormat: Text.PlainText
 		font.pixelSize: Theme.fontSize
 		color: Theme.text
 		wrapMode: Text.Wrap
-		width: Math.min(control.widest, Math.ceil(metrics.advanceWidth) + 1)
 	}
 
 	background: Rectangle {
