@@ -1,7 +1,5 @@
 #include "CoreOrlexTypesUtils/RigidBodyAttachment.h"
 
-#include "CoreOrlexTypesUtils/RigidBodyRefusal.h"
-
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/NameHash.h"
 #include "CoreOrlexTypesUtils/Expectation.h"
@@ -12,6 +10,8 @@
 #include "CoreOrlexTypesUtils/SubjectKind.h"
 #include "CoreOrlexTypesUtils/TargetFrames.h"
 #include "CoreOrlexTypesUtils/UnusedParameters.h"
+
+#include "DebugServices/GlobalLog.h"
 
 #include <algorithm>
 #include <set>
@@ -28,6 +28,13 @@ using CoreOrlexTypes::VSubjectParametrised;
 using Rotation::VMatrix3;
 using Rotation::VVector3;
 using VPose = Rotation::VPose<double>;
+
+template <typename... VArguments>
+bool Refuse(const char* i_pMessage, const VArguments&... i_rArguments)
+{
+	NVX_LOG("RigidBodyUtils", NVX::ELogError, i_pMessage, i_rArguments...);
+	return false;
+}
 
 template <typename TSubject>
 bool GoTogether(const TSubject& i_rSubject, const VSubjectApplicationData& i_rAppData)

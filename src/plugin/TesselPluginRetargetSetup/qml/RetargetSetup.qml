@@ -98,7 +98,7 @@ Rectangle {
 		id: columns
 
 		readonly property real minimumWidth: leftColumn.minimumWidth + middle.SplitView.minimumWidth
-			+ right.SplitView.minimumWidth + 2 * 6
+			+ right.implicitWidth + 2 * 6
 
 		objectName: "columns"
 		anchors.fill: parent
@@ -364,41 +364,44 @@ Rectangle {
 			}
 		}
 
-		ColumnLayout {
+		Item {
 			id: right
 
 			implicitWidth: 200
-			SplitView.preferredWidth: 200
 			SplitView.minimumWidth: 120
-			spacing: 0
 
-			OrlexLabel {
-				Layout.margins: Theme.spacing
-				Layout.fillWidth: true
-				text: "Source Segments"
-				color: Theme.windowText
-			}
-			RetargetSetupSegmentList {
-				objectName: "sourceSegments"
-				Layout.fillWidth: true
-				Layout.fillHeight: true
-				title: "Source Segments"
-				model: SourceSegmentModel
-				selectedIndex: RetargetSetupSelection.selectedSourceSegment
-			}
-			OrlexLabel {
-				Layout.margins: Theme.spacing
-				Layout.fillWidth: true
-				text: "Target Segments"
-				color: Theme.bright
-			}
-			RetargetSetupSegmentList {
-				objectName: "targetSegments"
-				Layout.fillWidth: true
-				Layout.fillHeight: true
-				title: "Target Segments"
-				model: TargetSegmentModel
-				selectedIndex: RetargetSetupSelection.selectedTargetSegment
+			ColumnLayout {
+				anchors.fill: parent
+				spacing: 0
+
+				OrlexLabel {
+					Layout.margins: Theme.spacing
+					Layout.fillWidth: true
+					text: "Source Segments"
+					color: Theme.windowText
+				}
+				RetargetSetupSegmentList {
+					objectName: "sourceSegments"
+					Layout.fillWidth: true
+					Layout.fillHeight: true
+					title: "Source Segments"
+					model: SourceSegmentModel
+					selectedIndex: RetargetSetupSelection.selectedSourceSegment
+				}
+				OrlexLabel {
+					Layout.margins: Theme.spacing
+					Layout.fillWidth: true
+					text: "Target Segments"
+					color: Theme.bright
+				}
+				RetargetSetupSegmentList {
+					objectName: "targetSegments"
+					Layout.fillWidth: true
+					Layout.fillHeight: true
+					title: "Target Segments"
+					model: TargetSegmentModel
+					selectedIndex: RetargetSetupSelection.selectedTargetSegment
+				}
 			}
 		}
 	}

@@ -97,7 +97,7 @@ Item {
 	Loader {
 		id: editor
 		x: row.labelWidth + Theme.spacing
-		width: row.width - x - resetter.width - 2
+		width: row.width - x - (resetter.visible ? resetter.width + 2 : 0)
 		enabled: row.editable
 		Component.onCompleted: source = Qt.binding(() => row.editorUrl())
 		onLoaded: {
