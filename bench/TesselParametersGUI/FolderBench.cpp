@@ -4,9 +4,9 @@
 #include "TesselParametersGUI/ParameterGroupModel.h"
 
 #include "InMemoryHost/Dispatcher.h"
+#include "InMemoryHost/ParameterRegistry.h"
 #include "TesselDataStore/DataStore.h"
 #include "TesselParameters/ParameterGroup.h"
-#include "TesselPluginInterface/IParameterRegistry.h"
 
 #include <QCoreApplication>
 #include <QDir>
@@ -22,24 +22,6 @@ namespace
 {
 
 using namespace TesselParametersGUI;
-
-class VOneGroup : public TesselPluginInterface::IParameterRegistry
-{
-public:
-	void Register(const std::string&, const std::shared_ptr<TesselPluginInterface::IParameterGroup>& i_rpGroup) override
-	{
-		m_pGroup = i_rpGroup;
-	}
-	std::shared_ptr<TesselPluginInterface::IParameterGroup> Find(const std::string&, const std::string&) const override
-	{
-		return m_pGroup;
-	}
-	NVX::VSignal<std::string, std::string>& RegisteredSignal() override { return m_Signal; }
-
-private:
-	std::shared_ptr<TesselPluginInterface::IParameterGroup> m_pGroup;
-	NVX::VSignal<std::string, std::string> m_Signal;
-};
 
 struct VFolderBench
 {
@@ -84,7 +66,7 @@ BENCHMARK(BM_QtEntryList)->Arg(100)->Arg(5000)->Unit(benchmark::kMillisecond);
 void BM_ModelFollowsAChoice(benchmark::State& io_rState)
 {
 	const VFolderBench bench(io_rState);
-	const auto pRegistry = std::make_shared<VOneGroup>();
+	const auto pRegistry = std::make_shared<InMemoryHost::VParameterRegistry>();
 	pRegistry->Register("RetargetSetup", bench.m_pGroup);
 	const auto pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
 	VParameterGroupModel model(pRegistry, pDispatcher, "RetargetSetup", "Subject");

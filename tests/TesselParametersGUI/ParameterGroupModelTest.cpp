@@ -3,8 +3,8 @@
 #include "TesselParameters/ParameterGroup.h"
 
 #include "InMemoryHost/Dispatcher.h"
+#include "InMemoryHost/ParameterRegistry.h"
 #include "TesselDataStore/DataStore.h"
-#include "TesselPluginInterface/IParameterRegistry.h"
 
 #include <QAbstractItemModelTester>
 #include <QSignalSpy>
@@ -18,26 +18,6 @@ using namespace TesselPluginInterface;
 using TesselDataStore::ToVariant;
 using TesselParameters::VParameterGroup;
 using TesselParametersGUI::VParameterGroupModel;
-
-class VRegistry : public IParameterRegistry
-{
-public:
-	void Register(const std::string& i_rPath, const std::shared_ptr<IParameterGroup>& i_rpGroup) override
-	{
-		m_Groups[i_rPath + '/' + i_rpGroup->GetName()] = i_rpGroup;
-		m_RegisteredSignal.Fire(i_rPath, i_rpGroup->GetName());
-	}
-	std::shared_ptr<IParameterGroup> Find(const std::string& i_rPath, const std::string& i_rName) const override
-	{
-		const auto found = m_Groups.find(i_rPath + '/' + i_rName);
-		return found == m_Groups.end() ? nullptr : found->second.lock();
-	}
-	NVX::VSignal<std::string, std::string>& RegisteredSignal() override { return m_RegisteredSignal; }
-
-private:
-	std::map<std::string, std::weak_ptr<IParameterGroup>> m_Groups;
-	NVX::VSignal<std::string, std::string> m_RegisteredSignal;
-};
 
 class GroupModel : public testing::Test
 {
@@ -57,7 +37,8 @@ protected:
 		return m_Model.data(m_Model.index(i_Row), m_Model.roleNames().key(i_pRole, -1));
 	}
 
-	const std::shared_ptr<VRegistry> m_pRegistry = std::make_shared<VRegistry>();
+	const std::shared_ptr<InMemoryHost::VParameterRegistry> m_pRegistry =
+	    std::make_shared<InMemoryHost::VParameterRegistry>();
 	const std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
 	std::shared_ptr<VParameterGroup> m_pGroup =
 	    std::make_shared<VParameterGroup>(std::make_shared<TesselDataStore::VDataStore>(), "RetargetSetup", "Target");

@@ -125,6 +125,8 @@ NVX::VConnection VDataStore::Subscribe(const std::string& i_rKey, VChangedCallba
 	if (!i_pDispatcher)
 		return {};
 	const std::lock_guard lock(m_SubscribersMutex);
+	// Those that have gone are not kept for a change that may never come.
+	std::erase_if(m_Subscribers, [](const auto& i_rEntry) { return i_rEntry.second->Count() == 0; });
 	std::shared_ptr<VSubscribers>& rpSubscribers = m_Subscribers[i_rKey];
 	if (!rpSubscribers)
 		rpSubscribers = std::make_shared<VSubscribers>();
