@@ -84,6 +84,25 @@ TEST_F(Module, GoesThroughALifeInTheHost)
 	}
 }
 
+TEST_F(Module, ComesAndGoesAHundredTimes)
+{
+	VTestContext context;
+	VTestGui gui(context);
+	for (int life = 0; life < 100; ++life)
+	{
+		IPlugin* const pPlugin = m_pCreate();
+		ASSERT_TRUE(pPlugin->RegisterQmlTypes() && pPlugin->CreateContent(context, gui));
+		ASSERT_EQ(gui.PanelManager().Panels().size(), std::size_t(life + 1));
+		delete gui.PanelManager().Panels().back().m_pWidget;
+		EXPECT_TRUE(pPlugin->ReleaseContent());
+		m_pDestroy(pPlugin);
+	}
+	// What the panels had posted finds none of them.
+	context.Folders().SetFolder("FolderSubjects", "/");
+	RunAll(context);
+	EXPECT_EQ(gui.m_pEngine->m_Warnings.join('\n').toStdString(), "");
+}
+
 TEST(ModuleFile, ShowsItsThreeFunctionsAndItsClassOnly)
 {
 	FILE* const pOutput = popen("nm -D -C --defined-only --extern-only " RETARGET_MODULE, "r");

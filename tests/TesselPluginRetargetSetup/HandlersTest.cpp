@@ -1,0 +1,304 @@
+// Parameters and document follow each other, and neither hears its own echo.
+
+#include "TestPanel.h"
+
+#include "OrlexGraphics/SkinCache.h"
+#include "TesselDataStore/StoredValue.h"
+
+#include <limits>
+
+namespace
+{
+
+namespace fs = boost::filesystem;
+using CoreOrlexTypes::VSubjectParametrised;
+using TesselDataStore::ToVariant;
+using TesselPluginInterface::IParameter;
+
+class Handlers : public VPanelTest
+{
+protected:
+	/// The demo with a position target, a rotation target and another position target.
+	void OpenWithTargets()
+	{
+		OpenDemo();
+		m_pDocument->CreateTargetSubject();
+		m_pDocument->AddTarget(0, 0, true, false);
+		m_pDocument->AddTarget(1, 1, false, false);
+		m_pDocument->AddTarget(2, 2, true, false);
+		VSubjectParametrised subject = Target();
+		subject.m_Targets[0].m_StateExpressions = {"0.5*GlobalScale", "-2", "GlobalScale"};
+		subject.m_Targets[0].m_Weight = 0.5;
+		m_pDocument->SetTargetSubjectParametrised(subject);
+		Run();
+		m_pDocument->GetChangedSignal().Connect([this] { ++m_Changes; });
+		TakeLog();
+	}
+
+	std::vector<std::string> Shown() const
+	{
+		return {Text("TargetWeight"), Text("TargetStateExpressionX"), Text("TargetStateExpressionY"),
+		    Text("TargetStateExpressionZ")};
+	}
+
+	std::vector<std::vector<std::string>> States() const
+	{
+		std::vector<std::vector<std::string>> states;
+		for (const VSubjectParametrised::VTarget& rTarget : Target().m_Targets)
+			states.push_back(rTarget.m_StateExpressions);
+		return states;
+	}
+
+	fs::path Copy(const std::string& i_rFrom, const fs::path& i_rTo) const
+	{
+		fs::create_directories((m_Folder / i_rTo).parent_path());
+		fs::copy_file(i_rFrom, m_Folder / i_rTo);
+		return m_Folder / i_rTo;
+	}
+
+	int m_Changes = 0;
+};
+
+TEST_F(Handlers, ShowingATargetRewritesNothing)
+{
+	OpenWithTargets();
+	const auto pBefore = m_pDocument->TargetValues().m_pParametrised;
+	Select(NVX::ESelectionTarget, 0);
+	EXPECT_EQ(Shown(), (std::vector<std::string>{"0.5", "0.5", "-2", "1"})) << "numbers, and a weight below the limit";
+	Select(NVX::ESelectionTarget, 1);
+	Select(NVX::ESelectionTarget, 2);
+	Select(NVX::ESelectionTarget, 0);
+	m_Context.SelectionManager().Selection().Replace({});
+	Run();
+	EXPECT_EQ(m_Changes, 0);
+	EXPECT_EQ(m_pDocument->TargetValues().m_pParametrised, pBefore);
+}
+
+TEST_F(Handlers, StatesAreHiddenForRotationsOnly)
+{
+	OpenWithTargets();
+	for (const auto& [index, bHidden] : {std::pair<int, bool>{1, true}, {0, false}, {1, true}, {2, false}})
+	{
+		Select(NVX::ESelectionTarget, std::uint32_t(index));
+		for (const char* const pKey : {"TargetStateExpressionX", "TargetStateExpressionY", "TargetStateExpressionZ"})
+			EXPECT_EQ(Parameter(pKey).GetFlags(), bHidden ? std::uint32_t(IParameter::EHidden) : 0u) << index << pKey;
+		EXPECT_EQ(Parameter("TargetWeight").GetFlags(), 0u);
+	}
+}
+
+TEST_F(Handlers, OnlyWhatIsTypedReachesTheTarget)
+{
+	OpenWithTargets();
+	Select(NVX::ESelectionTarget, 0);
+	EXPECT_EQ(Type("TargetWeight", "20"), "");
+	EXPECT_EQ(Target().m_Targets[0].m_Weight, 20.0);
+	EXPECT_EQ(
+	    Target().m_Targets[0].m_StateExpressions, (std::vector<std::string>{"0.5*GlobalScale", "-2", "GlobalScale"}));
+	EXPECT_EQ(Target().m_Targets[2].m_Weight, 1.0);
+	EXPECT_EQ(m_Changes, 1);
+
+	EXPECT_EQ(Type("TargetStateExpressionY", "7.25"), "");
+	EXPECT_EQ(Target().m_Targets[0].m_StateExpressions,
+	    (std::vector<std::string>{"0.5*GlobalScale", "7.250000*GlobalScale", "GlobalScale"}));
+	EXPECT_EQ(m_Changes, 2);
+
+	EXPECT_NE(Type("TargetWeight", "0.5"), "") << "an operator cannot type what a file may hold";
+	EXPECT_EQ(m_Changes, 2);
+	EXPECT_EQ(TakeLog(), "");
+}
+
+TEST_F(Handlers, WhatTheDocumentRefusesIsShownAsItIsAgain)
+{
+	OpenWithTargets();
+	Select(NVX::ESelectionTarget, 0);
+	EXPECT_EQ(Type("TargetStateExpressionX", "twelve"), "");
+	EXPECT_NE(TakeLog().find("State X of target 0 stays as it was"), std::string::npos);
+	EXPECT_EQ(Text("TargetStateExpressionX"), "0.5");
+	EXPECT_EQ(Target().m_Targets[0].m_StateExpressions[0], "0.5*GlobalScale");
+}
+
+TEST_F(Handlers, NoStaleNumberIsWrittenBackAfterTheDocumentMoved)
+{
+	OpenWithTargets();
+	Select(NVX::ESelectionTarget, 0);
+	m_pDocument->UpdateTargets();
+	Run();
+	EXPECT_EQ(Shown()[1], "0");
+	const auto afterUpdate = States();
+	m_pDocument->SetTargetScale(2.0);
+	Run();
+	EXPECT_EQ(Text("TargetScale"), "2");
+	EXPECT_EQ(States(), afterUpdate);
+	m_pDocument->RemoveTarget(0);
+	Run();
+	ASSERT_EQ(Target().m_Targets.size(), 2u);
+	EXPECT_EQ(States()[0], afterUpdate[1]) << "the next one has taken the selected place";
+	EXPECT_EQ(m_pSelection->SelectedTarget(), 0);
+	EXPECT_TRUE(Parameter("TargetStateExpressionX").GetFlags() & IParameter::EHidden);
+	EXPECT_EQ(TakeLog(), "");
+}
+
+TEST_F(Handlers, ScaleFollowsTheFileAndKeepsItsParameters)
+{
+	OpenWithTargets();
+	VSubjectParametrised subject = Target();
+	subject.m_DynamicParameters.push_back({"Age", 0, 0, 40, false});
+	subject.m_DynamicParameters[0].m_Value = 1.5;
+	m_pDocument->SetTargetSubjectParametrised(subject);
+	Run();
+	EXPECT_EQ(Text("TargetScale"), "1.5");
+	EXPECT_EQ(Target().m_DynamicParameters.size(), 2u) << "showing the scale writes nothing";
+	EXPECT_EQ(Type("TargetScale", "1.50"), "");
+	EXPECT_EQ(Target().m_DynamicParameters.size(), 2u) << "nor does typing the same";
+	EXPECT_EQ(TakeLog(), "");
+
+	for (const double refused : {0.0, -1.0, std::numeric_limits<double>::infinity()})
+	{
+		Parameter("TargetScale").SetValue(ToVariant(refused));
+		Run();
+		EXPECT_EQ(Text("TargetScale"), "1.5") << refused;
+		EXPECT_EQ(Target().m_DynamicParameters.size(), 2u);
+		EXPECT_NE(TakeLog().find("A scale must be a finite number above 0"), std::string::npos);
+	}
+
+	m_pDocument->CreateTargetSubject();
+	Run();
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 1.5) << "a new subject has the scale that is shown";
+	EXPECT_EQ(Type("TargetScale", "2"), "");
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 2.0);
+}
+
+TEST_F(Handlers, ScaleIsLeftAloneWhileThereIsNoTarget)
+{
+	OpenDemo();
+	EXPECT_EQ(Type("TargetScale", "3"), "");
+	EXPECT_EQ(Type("SourceSkeleton", "performer"), "");
+	EXPECT_EQ(Text("TargetScale"), "3");
+	m_pDocument->CreateTargetSubject();
+	Run();
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 3.0);
+}
+
+TEST_F(Handlers, AnFBXFileBringsItsBones)
+{
+	OpenDemo();
+	const std::vector<TesselPluginInterface::VEnumEntry> bones = Parameter("TargetRoot").GetEnumeration();
+	ASSERT_EQ(bones.size(), m_pDocument->GetFBXSkeleton()->size());
+	EXPECT_EQ(bones[1].m_Name, " loin") << "below the haunch";
+	EXPECT_EQ(bones[1].m_Value, ToVariant(std::uint32_t(1)));
+	EXPECT_EQ(Text("TargetRoot"), "0");
+	EXPECT_EQ(Type("TargetRoot", "1"), "");
+	m_pDocument->CreateTargetSubject();
+	Run();
+	EXPECT_EQ(Target().m_Segments[0].m_Name, "loin");
+
+	m_Context.Folders().SetFolder("FolderSkins", RETARGET_TEST_DATA "/fbx");
+	Run();
+	EXPECT_EQ(Type("TargetFBX", "heaps_biped_zup_a7100"), "");
+	EXPECT_EQ(Text("TargetRoot"), "0");
+	EXPECT_NE(Parameter("TargetRoot").GetEnumeration(), bones);
+	EXPECT_EQ(Target().m_Segments[0].m_Name, "loin") << "nothing is built before the command";
+	EXPECT_EQ(Type("TargetFBX", "(None)"), "");
+	EXPECT_TRUE(m_pDocument->GetFBXSkeleton()) << "no choice ends the handler";
+}
+
+TEST_F(Handlers, SourcesAreNeverLookedForWhereTheProcessRuns)
+{
+	OpenDemo();
+	EXPECT_EQ(m_pDocument->GetShownSourceName(), "performer");
+	m_pDocument->CreateTargetSubject();
+	VSubjectParametrised subject;
+	CoreOrlexTypes::VSubjectApplicationData data;
+	ASSERT_TRUE(m_pDocument->GetTargetSubjectAndData(subject, data));
+	const auto saveWithSource = [&](const char* i_pSource)
+	{
+		data.m_RetargetSourceTemplate = i_pSource;
+		m_pDocument->SetTargetSubject(subject, data);
+		EXPECT_EQ(m_pDocument->SaveTargetSubject(m_Folder / "a.qrr"), 0u);
+		m_pDocument->SetTargetSubject(subject, data);
+		Run();
+		TakeLog();
+		EXPECT_EQ(m_pDocument->LoadTargetSubject(m_Folder / "a.qrr"), 0u);
+		Run();
+	};
+	saveWithSource("elsewhere");
+	EXPECT_EQ(Text("SourceSkeleton"), "elsewhere");
+	EXPECT_NE(
+	    TakeLog().find("Source 'elsewhere' is in none of the folders, still showing 'performer'"), std::string::npos);
+	EXPECT_EQ(m_pDocument->GetShownSourceName(), "performer");
+
+	EXPECT_EQ(Type("SourceSkeleton", "performer"), "");
+	EXPECT_EQ(m_pDocument->GetSourceName(), "performer") << "loaded again, since the document had been told another";
+	saveWithSource("performer");
+	EXPECT_EQ(fs::path(Text("SourceSkeleton")).filename(), "performer.qrs");
+	saveWithSource("");
+	EXPECT_EQ(Text("SourceSkeleton"), "") << "a subject without a source clears the choice";
+}
+
+TEST_F(Handlers, TheSourceThatIsThereIsNotReadAgain)
+{
+	OpenDemo();
+	const auto pBefore = m_pDocument->SourceValues().m_pParametrised;
+	m_pDocument->CreateTargetSubject();
+	Run();
+	Parameter("SourceSkeleton").SetValue(ToVariant(std::string("gone")));
+	Run();
+	EXPECT_EQ(Type("SourceSkeleton", "performer"), "");
+	EXPECT_EQ(m_pDocument->SourceValues().m_pParametrised, pBefore);
+	const fs::path skin = Copy(c_DemoFBX, "skins/OrlexA.fbx");
+	Parameter("SourceSkin").SetValue(ToVariant(skin));
+	Run();
+	EXPECT_NE(m_pDocument->SourceValues().m_pParametrised, pBefore);
+	EXPECT_EQ(m_pDocument->SourceValues().m_pApplicationData->m_Skin, "OrlexA");
+}
+
+TEST_F(Handlers, StoredValuesAreThereAgain)
+{
+	const fs::path source = Copy(c_DemoSource, "subjects/anna.qrs");
+	OpenDemo();
+	Parameter("SourceSkeleton").SetValue(ToVariant(source.string()));
+	EXPECT_EQ(Type("TargetRoot", "3"), "");
+	EXPECT_EQ(Type("TargetScale", "1.25"), "");
+	m_pWidget.reset();
+	Run();
+	TakeLog();
+
+	Open();
+	EXPECT_EQ(m_pDocument->GetShownSourceName(), "anna") << "from outside the folders";
+	ASSERT_TRUE(m_pDocument->GetFBXSkeleton());
+	EXPECT_EQ(Text("TargetRoot"), "3");
+	m_pDocument->CreateTargetSubject();
+	Run();
+	EXPECT_EQ(Target().m_Segments[0].m_Name, (*m_pDocument->GetFBXSkeleton())[3].m_Name);
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 1.25);
+	EXPECT_EQ(TakeLog().find("none of the folders"), std::string::npos);
+}
+
+TEST_F(Handlers, SkinsAreLookedForInTheUsersFolder)
+{
+	Copy(c_DemoFBX, "skins/dragon.fbx");
+	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "skins");
+	Open();
+	fs::path found;
+	const auto status = [&](const char* i_pName) { return m_pGui->m_pSkinCache->GetPath(found, i_pName, "Subject"); };
+	EXPECT_EQ(status("dragon"), OrlexGraphics::SkinStatus::c_Ready);
+	EXPECT_EQ(found, m_Folder / "skins/dragon.fbx");
+	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "none");
+	Run();
+	EXPECT_EQ(status("dragon"), OrlexGraphics::SkinStatus::c_NotFound);
+}
+
+TEST_F(Handlers, EndWithThePanel)
+{
+	OpenDemo();
+	Parameter("TargetScale").SetValue(ToVariant(4.0));
+	m_pDocument->CreateTargetSubject();
+	m_pWidget.reset();
+	Run();
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 1.0) << "what was posted finds nobody";
+	m_pDocument->CreateTargetSubject();
+	m_Context.Folders().SetFolder("FolderSubjects", "/");
+	Run();
+}
+
+} // namespace
