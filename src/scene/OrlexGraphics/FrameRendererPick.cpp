@@ -1,5 +1,5 @@
+#include "OrlexGraphics/FrameRenderer.h"
 #include "OrlexGraphics/OrlexScene.h"
-#include "OrlexGraphics/SceneFramebufferRenderer.h"
 #include "OrlexGraphics/SelectionKinds.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SphereHelper.h"
@@ -27,75 +27,76 @@ constexpr double c_RectangleScale = 0.5;
 
 } // namespace
 
-void VSceneFramebufferRenderer::Pick(const QSize& i_rFrame)
+void VFrameRenderer::Pick(const VPickRequest& i_rRequest, VPick& o_rPick)
 {
 	if (!m_pPickFramebuffer)
 		m_pPickFramebuffer = std::make_unique<QOpenGLFramebufferObject>(c_PickSize, QOpenGLFramebufferObject::Depth);
+	BeginFrame();
 	m_Context.m_Mode = CoreGraphics::ERenderPick;
 	m_Context.BindFramebuffer(m_pPickFramebuffer.get());
 	m_Context.SetClearColour(QColor(0, 0, 0, 0));
 
+	const double ratio = m_Input.m_PixelRatio;
 	const auto devicePixel = [&](const QPoint& i_rPoint)
-	{ return QPoint(qRound(i_rPoint.x() * m_PixelRatio), qRound(i_rPoint.y() * m_PixelRatio)); };
-	const QPoint mouse = devicePixel(m_Request.m_Mouse);
+	{ return QPoint(qRound(i_rPoint.x() * ratio), qRound(i_rPoint.y() * ratio)); };
+	const QPoint mouse = devicePixel(i_rRequest.m_Mouse);
 	m_PickedIds.clear();
-	if (m_Request.m_bRectangle)
+	if (!i_rRequest.m_bRectangle)
 	{
-		const float diagonal = m_Context.m_Projection(0, 0) + m_Context.m_Projection(1, 1);
-		if (m_pScene->ExactPick())
-			PickRect(devicePixel(m_Request.m_Start), mouse,
-			    std::min(2.0 / std::max(static_cast<double>(diagonal), 1e-9), 1.0), 1, i_rFrame);
-		else
-			PickRect(devicePixel(m_Request.m_Start), mouse, c_RectangleScale, c_MaxLayers, i_rFrame);
+		if (const std::uint32_t id = PickPoint(mouse))
+			m_PickedIds.push_back(id);
 	}
-	else if (const std::uint32_t id = PickPoint(mouse, i_rFrame))
-		m_PickedIds.push_back(id);
+	else if (m_pScene->ExactPick())
+	{
+		const double zoom = static_cast<double>(m_Context.m_Projection(0, 0) + m_Context.m_Projection(1, 1));
+		PickRect(devicePixel(i_rRequest.m_Start), mouse, zoom > 2.0 ? 2.0 / zoom : 1.0, 1);
+	}
+	else
+		PickRect(devicePixel(i_rRequest.m_Start), mouse, c_RectangleScale, c_MaxLayers);
 	m_Context.ResetScissor();
-	m_Pick.m_Request = m_Request;
-	m_Pick.m_Request.m_Frame = m_Frame;
-	m_Pick.m_Names.clear();
-	m_Pick.m_Items = m_pScene->MakeSelection(m_PickedIds, m_Pick.m_Names);
-	if (m_Request.m_bRectangle)
-		std::erase_if(m_Pick.m_Items,
+
+	o_rPick.m_Request = i_rRequest;
+	o_rPick.m_Request.m_Frame = m_UpdateCount;
+	o_rPick.m_Names.clear();
+	o_rPick.m_Items = m_pScene->MakeSelection(m_PickedIds, o_rPick.m_Names);
+	if (i_rRequest.m_bRectangle)
+		std::erase_if(o_rPick.m_Items,
 		    [](const NVX::ISelectionItem& i_rItem) { return i_rItem.m_Kind == ESelectionManipulatorHandle; });
-	m_bPicked = true;
 }
 
-void VSceneFramebufferRenderer::ReadIds(const QRect& i_rRectangle)
+void VFrameRenderer::ReadIds(const QRect& i_rRectangle)
 {
 	QOpenGLFunctions& rGL = *m_Context.m_pFunctions;
 	rGL.glEnable(GL_SCISSOR_TEST);
 	rGL.glScissor(i_rRectangle.x(), i_rRectangle.y(), i_rRectangle.width(), i_rRectangle.height());
 	m_Context.ClearBuffers(true, true);
 	m_pScene->SphereHelper()->Clear();
-	if (!m_Options.m_bCameraView)
+	if (!m_Input.m_Options.m_bCameraView)
 		RenderPasses();
 	m_Context.ReadPixels(i_rRectangle, m_Pixels);
 }
 
-std::uint32_t VSceneFramebufferRenderer::PickPoint(const QPoint& i_rMouse, const QSize& i_rFrame)
+std::uint32_t VFrameRenderer::PickPoint(const QPoint& i_rMouse)
 {
-	const QRect rectangle = PointPickRectangle(i_rMouse, i_rFrame.height(), m_pPickFramebuffer->size());
+	const QRect rectangle = PointPickRectangle(i_rMouse, m_Size.height(), m_pPickFramebuffer->size());
 	if (rectangle.isEmpty())
 		return 0;
 	VSelectionRegistry& rRegistry = m_pScene->Registry();
 	rRegistry.ClearExcluded();
-	rRegistry.ExcludeOutside(MakePickFrustum(m_Context.m_Projection * m_Context.m_View, rectangle, i_rFrame));
+	rRegistry.ExcludeOutside(MakePickFrustum(m_Context.m_Projection * m_Context.m_View, rectangle, m_Size));
 	ReadIds(rectangle);
 	return NearestId(m_Pixels.data(), rectangle.size(),
-	    QPoint(i_rMouse.x(), i_rFrame.height() - 1 - i_rMouse.y()) - rectangle.topLeft());
+	    QPoint(i_rMouse.x(), m_Size.height() - 1 - i_rMouse.y()) - rectangle.topLeft());
 }
 
-void VSceneFramebufferRenderer::PickRect(
-    const QPoint& i_rA, const QPoint& i_rB, double i_Scale, int i_MaxPasses, const QSize& i_rFrame)
+void VFrameRenderer::PickRect(const QPoint& i_rA, const QPoint& i_rB, double i_Scale, int i_MaxPasses)
 {
-	const QSize scaled(qRound(i_rFrame.width() * i_Scale), qRound(i_rFrame.height() * i_Scale));
+	const QSize scaled(qRound(m_Size.width() * i_Scale), qRound(m_Size.height() * i_Scale));
 	const QRect rectangle =
-	    RectanglePickRectangle(i_rA, i_rB, i_Scale, i_rFrame) & QRect(QPoint(), m_pPickFramebuffer->size());
+	    RectanglePickRectangle(i_rA, i_rB, i_Scale, m_Size) & QRect(QPoint(), m_pPickFramebuffer->size());
 	if (rectangle.isEmpty())
 		return;
 	const QRect viewport = m_Context.m_Viewport;
-	const QSize frameSize = m_Context.m_FrameSize;
 	m_Context.SetViewport(QRect(QPoint(), scaled));
 	m_Context.m_FrameSize = scaled;
 
@@ -114,7 +115,7 @@ void VSceneFramebufferRenderer::PickRect(
 		    [&](std::uint32_t i_Id) { rRegistry.Exclude(i_Id); });
 	}
 	m_Context.SetViewport(viewport);
-	m_Context.m_FrameSize = frameSize;
+	m_Context.m_FrameSize = m_Size;
 }
 
 } // namespace OrlexGraphics
