@@ -5,6 +5,7 @@
 #include <QAccessible>
 #include <QFileInfo>
 #include <QQmlPropertyMap>
+#include <QQuickWidget>
 #include <QSignalSpy>
 #include <QTest>
 
@@ -331,6 +332,35 @@ TEST(ComboBox, ListFollowsItsModel)
 	EXPECT_EQ(page.Property("box", "displayText"), "");
 	page.Key(Qt::Key_Return);
 	EXPECT_EQ(page.Property("box", "displayText"), "x");
+}
+
+TEST(ComboBox, WorksInAWidget)
+{
+	QQmlEngine engine;
+	StudioHost::RegisterQmlModules(engine, {});
+	QQmlComponent component(&engine);
+	component.setData("import QtQuick 2.15\nimport Orlex.Controls 1.0\nItem { OrlexComboBox { id: box; width: 150\n"
+	                  "model: Array.from({length: 100}, (x, i) => \"Bone\" + i) }\n"
+	                  "property alias shown: box.displayText }",
+	    QUrl("qrc:/Page.qml"));
+	QQuickWidget widget(&engine, nullptr);
+	QObject* const pRoot = component.create();
+	ASSERT_TRUE(pRoot) << component.errorString().toStdString();
+	widget.setContent(QUrl("qrc:/Page.qml"), &component, pRoot);
+	widget.setResizeMode(QQuickWidget::SizeRootObjectToView);
+	widget.resize(400, 300);
+	widget.show();
+	widget.activateWindow();
+	ASSERT_TRUE(QTest::qWaitForWindowActive(&widget));
+	widget.setFocus();
+	QTest::mouseClick(&widget, Qt::LeftButton, {}, {30, 12});
+	QTest::keyClicks(&widget, "77");
+	QTest::keyClick(&widget, Qt::Key_Return);
+	EXPECT_EQ(pRoot->property("shown"), "Bone77");
+	QTest::mouseClick(&widget, Qt::LeftButton, {}, {30, 12});
+	QTest::keyClick(&widget, Qt::Key_Escape);
+	QTest::keyClick(&widget, Qt::Key_Down);
+	EXPECT_EQ(pRoot->property("shown"), "Bone78");
 }
 
 TEST(SplitView, ThreeColumnsAreDragged)

@@ -194,6 +194,12 @@ TEST(ParameterView, Enumerations)
 	EXPECT_EQ(page.m_Model.Text("Root"), bones[4711]);
 	EXPECT_EQ(page.m_Page.Property("Root", "displayText"), "Bone4711");
 
+	// A stray arrow key changes nothing, it opens the list.
+	page.m_Page.Key(Qt::Key_Down);
+	EXPECT_TRUE(page.m_Page.Has("RootList"));
+	page.m_Page.Key(Qt::Key_Escape);
+	EXPECT_EQ(page.m_Model.Text("Root"), bones[4711]);
+
 	// A value that the list does not have is shown as it is.
 	EXPECT_EQ(page.m_Page.Property("Source", "displayText"), "Gone");
 	EXPECT_EQ(page.m_Page.Property("Source", "currentIndex"), -1);

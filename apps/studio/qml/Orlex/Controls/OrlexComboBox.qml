@@ -18,6 +18,8 @@ Item {
 	property string placeholderText: ""
 	property string toolTip: ""
 	property bool filterable: count > 12
+	// Whether the arrow keys pick without the list. They open it where a pick costs time.
+	property bool steps: true
 	property bool invalid: false
 	property color textColor: Theme.text
 	readonly property alias hovered: mouse.containsMouse
@@ -58,14 +60,10 @@ Item {
 		if (event.key === Qt.Key_F4 || event.key === Qt.Key_Space || event.key === Qt.Key_Return
 				|| event.key === Qt.Key_Enter || event.key === Qt.Key_Down && event.modifiers & Qt.AltModifier)
 			open("")
-		else if (event.key === Qt.Key_Up)
-			step(-1)
-		else if (event.key === Qt.Key_Down)
-			step(1)
-		else if (event.key === Qt.Key_Home)
-			step(-count)
-		else if (event.key === Qt.Key_End)
-			step(count)
+		else if (event.key === Qt.Key_Up || event.key === Qt.Key_Down)
+			steps ? step(event.key === Qt.Key_Up ? -1 : 1) : open("")
+		else if (steps && (event.key === Qt.Key_Home || event.key === Qt.Key_End))
+			step(event.key === Qt.Key_Home ? -count : count)
 		else if (filterable && event.text.trim() !== "" && !(event.modifiers & (Qt.ControlModifier | Qt.AltModifier)))
 			open(event.text)
 		else
@@ -189,7 +187,8 @@ Item {
 				list.forceActiveFocus()
 			list.positionViewAtIndex(list.currentIndex, ListView.Center)
 		}
-		onClosed: control.forceActiveFocus(Qt.PopupFocusReason)
+		// With the reason of popups nested focus scopes do not get it back.
+		onClosed: control.forceActiveFocus()
 
 		background: Rectangle {
 			color: Theme.dark

@@ -23,6 +23,8 @@ Item {
 		objectName: editor.row ? editor.row.name : ""
 		width: parent.width - (fileButton.visible ? fileButton.width + 4 : 0)
 		model: editor.row ? editor.row.enumNames : []
+		// A pick may load a file.
+		steps: false
 		displayText: currentIndex >= 0 ? currentText : editor.foreign ? editor.row.valueText : ""
 		placeholderText: count > 0 ? "Not set" : "Nothing to choose from"
 		textColor: editor.foreign ? Theme.warning : Theme.text
