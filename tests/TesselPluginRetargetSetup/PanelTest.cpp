@@ -303,9 +303,11 @@ TEST_F(Panel, AddsAndRemovesTargetsOfTheSelection)
 	EXPECT_FALSE(Property("removeTarget", "enabled").toBool());
 	Select(NVX::ESelectionTarget, 1);
 	EXPECT_TRUE(Property("removeTarget", "enabled").toBool());
+	EXPECT_TRUE(Property("targetParameters", "enabled").toBool());
 	Click("removeTarget");
 	EXPECT_EQ(Target().m_Targets.size(), 1u);
 	EXPECT_FALSE(Property("removeTarget", "enabled").toBool()) << "it was the last one";
+	EXPECT_FALSE(Property("targetParameters", "enabled").toBool());
 
 	m_Context.SelectionManager().Selection().Add({{NVX::ESelectionSourceSegment, RetargetSetup::c_SubjectId, 1, {}}});
 	Run();

@@ -75,7 +75,7 @@ TEST_F(PanelParameters, AreCalledAndLimitedSo)
 	        "Skin file for source skeleton.", {}, true},
 	    {"Subject", "TargetFBX", EValueKind::EText, text, "Target FBX", "Skin file for target skeleton.", {}, true},
 	    {"Subject", "TargetRoot", EValueKind::EInteger, TesselDataStore::SchemaOf<std::uint32_t>(), "Target Root",
-	        "Root bone for target skeleton", {}},
+	        "Root bone for target skeleton", {}, true},
 	    {"Subject", "TargetScale", EValueKind::EReal, real, "Target Scale", "Global scale to apply to target skeleton",
 	        ToVariant(1.0)},
 	    {"Target", "TargetWeight", EValueKind::EReal, real, "Weight", "Skin file for target skeleton.", {}, false,

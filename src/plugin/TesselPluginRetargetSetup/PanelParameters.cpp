@@ -64,6 +64,7 @@ VPanelParameters::VPanelParameters(const std::shared_ptr<TesselPluginInterface::
 	m_pTargetFBX = m_pSubjectGroup->AddNew<VParameterFBX>(
 	    "Target FBX", "Skin file for target skeleton.", "TargetFBX", CheckerOf<std::string>());
 	m_pTargetRoot = m_pSubjectGroup->Add<std::uint32_t>("TargetRoot", "Target Root", "Root bone for target skeleton");
+	SetBones({});
 	m_pTargetScale =
 	    m_pSubjectGroup->Add<double>("TargetScale", "Target Scale", "Global scale to apply to target skeleton");
 	m_pTargetScale->SetDefault(1.0);

@@ -236,6 +236,10 @@ Rectangle {
 				RetargetSetupTargetTable {
 					objectName: "targets"
 					Layout.fillWidth: true
+					emptyText: targetSegments.count === 0
+						? "Choose a source skeleton and a target FBX above, then create the target subject."
+						: sourceSegments.count === 0 ? "Choose a source skeleton above."
+						: "Select one segment in each list on the right, then add a target."
 					Layout.fillHeight: true
 					Layout.minimumHeight: 6 * Theme.itemHeight
 				}
@@ -252,6 +256,7 @@ Rectangle {
 				ParameterView {
 					objectName: "targetParameters"
 					Layout.fillWidth: true
+					enabled: RetargetSetupSelection.selectedTarget !== -1
 					model: retargetSetup.targetParametersModel
 				}
 			}
@@ -381,6 +386,7 @@ Rectangle {
 					color: Theme.windowText
 				}
 				RetargetSetupSegmentList {
+					id: sourceSegments
 					objectName: "sourceSegments"
 					Layout.fillWidth: true
 					Layout.fillHeight: true
@@ -395,6 +401,7 @@ Rectangle {
 					color: Theme.bright
 				}
 				RetargetSetupSegmentList {
+					id: targetSegments
 					objectName: "targetSegments"
 					Layout.fillWidth: true
 					Layout.fillHeight: true

@@ -11,6 +11,7 @@ FocusScope {
 	id: segmentList
 
 	property alias model: view.model
+	readonly property alias count: view.count
 	// What the lists are told apart by, for who cannot see them.
 	property string title: ""
 	// The one segment that is selected, -1 for none and for several.

@@ -10,5 +10,4 @@ OrlexTableView {
 		{ role: "targetType", title: "Type", share: 0.25 },
 		{ role: "weight", title: "Weight", share: 0.2 }
 	]
-	emptyText: "Select one segment in each list on the right, then add a target."
 }
