@@ -11,7 +11,7 @@ using Indices = std::vector<std::uint32_t>;
 
 TEST_F(VViewTest, SelectsWithTheMouse)
 {
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
 	m_pSelection->Selection().Replace({Item(9)});
 	Show();
 	const QPoint one(40, 40), two(120, 40), nothing(80, 120);
@@ -45,7 +45,7 @@ TEST_F(VViewTest, SelectsWithTheMouse)
 TEST_F(VViewTest, PicksTheNearestWithinFivePixels)
 {
 	// One pixel each, to both sides of the mouse in (50, 50).
-	m_pScene->m_Boxes = {
+	m_pScene->m_Next.m_Boxes = {
 	    {Item(1), {46, 50, 1, 1}},
 	    {Item(2), {54, 50, 1, 1}},
 	    {Item(3), {100, 53, 1, 1}},
@@ -78,15 +78,15 @@ TEST_F(VViewTest, PicksTheNearestWithinFivePixels)
 TEST_F(VViewTest, SelectsARectangleThroughSixteenLayers)
 {
 	for (std::uint32_t i = 0; i < 18; ++i)
-		m_pScene->m_Boxes.push_back({Item(i), {40, 40, 40, 40}, -10.0f * static_cast<float>(i)});
-	m_pScene->m_Boxes.push_back({Item(90), {140, 40, 20, 20}});
-	m_pScene->m_Boxes.push_back({Item(91, 28), {50, 50, 10, 10}, 500.0f});
+		m_pScene->m_Next.m_Boxes.push_back({Item(i), {40, 40, 40, 40}, -10.0f * static_cast<float>(i)});
+	m_pScene->m_Next.m_Boxes.push_back({Item(90), {140, 40, 20, 20}});
+	m_pScene->m_Next.m_Boxes.push_back({Item(91, 28), {50, 50, 10, 10}, 500.0f});
 	Show();
 
 	Press({30, 30}, Qt::AltModifier);
 	Drag({60, 70}, Qt::AltModifier);
 	// A rectangle of the selection's colours while it is drawn.
-	EXPECT_TRUE(Until([&] { return qBlue(Grab().pixel(35, 65)) > qRed(Grab().pixel(35, 65)) + 20; }));
+	EXPECT_TRUE(Until([&] { return qBlue(Pixel(35, 65)) > qRed(Pixel(35, 65)) + 20; }));
 	Drag({110, 110}, Qt::AltModifier);
 	Release({110, 110}, Qt::AltModifier);
 	ASSERT_TRUE(Commit());
@@ -119,7 +119,7 @@ TEST_F(VViewTest, SelectsARectangleThroughSixteenLayers)
 
 TEST_F(VViewTest, PicksHandlesByPointOnly)
 {
-	m_pScene->m_Boxes = {{Item(1, 28), {20, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1, 28), {20, 20, 40, 40}}};
 	Show();
 	Hover({40, 40});
 	EXPECT_TRUE(Until([&] { return Preselected() == Indices{1}; }));
@@ -128,7 +128,7 @@ TEST_F(VViewTest, PicksHandlesByPointOnly)
 TEST_F(VViewTest, ShowsWhatTheMousePointsAt)
 {
 	for (std::uint32_t i = 0; i < 11; ++i)
-		m_pScene->m_Boxes.push_back({Item(i), QRectF(20 + 10 * i, 20, 8, 8), 0.0f, {0, 0, 1, 1}, 0,
+		m_pScene->m_Next.m_Boxes.push_back({Item(i), QRectF(20 + 10 * i, 20, 8, 8), 0.0f, {0, 0, 1, 1}, 0,
 		    std::string(1, static_cast<char>('a' + i))});
 	Show();
 	QSignalSpy toolTips(m_pView, &OrlexGraphics::VSceneFramebufferObject::ToolTipTextChanged);
@@ -140,8 +140,7 @@ TEST_F(VViewTest, ShowsWhatTheMousePointsAt)
 	EXPECT_EQ(m_pView->GetToolTipText(), "b");
 	EXPECT_EQ(toolTips.count(), 2);
 
-	QEvent leave(QEvent::Leave);
-	QCoreApplication::sendEvent(m_pWidget.get(), &leave);
+	Leave();
 	EXPECT_TRUE(Until([&] { return Preselected().empty() && m_pView->GetToolTipText().isEmpty(); }));
 	EXPECT_EQ(m_pView->MouseState(), OrlexGraphics::EMouseIdle);
 
@@ -158,7 +157,7 @@ TEST_F(VViewTest, ShowsWhatTheMousePointsAt)
 
 TEST_F(VViewTest, PreselectsWhatAClickWouldChange)
 {
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
 	m_pSelection->Selection().Replace({Item(1)});
 	Show();
 	const struct
@@ -186,7 +185,7 @@ TEST_F(VViewTest, PreselectsWhatAClickWouldChange)
 
 TEST_F(VViewTest, TellsAClickFromMovingTheCamera)
 {
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}};
 	Show();
 	m_pView->SetCameraType(CoreGraphics::ECameraPerspective);
 	CoreGraphics::VCameraController& rCamera = m_pView->Camera();
@@ -214,7 +213,7 @@ TEST_F(VViewTest, TellsAClickFromMovingTheCamera)
 
 TEST_F(VViewTest, LosesNoClickToTheMouseThatGoesOn)
 {
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}};
 	Show();
 	Click({40, 40});
 	Hover({150, 120});
@@ -222,7 +221,7 @@ TEST_F(VViewTest, LosesNoClickToTheMouseThatGoesOn)
 	// What moves the camera or the boxes lets the click wait for the picture that the operator does not see yet.
 	m_pSelection->Selection().Replace({});
 	Click({40, 40});
-	m_pScene->m_Boxes[0].m_Item = Item(5);
+	m_pScene->m_Next.m_Boxes[0].m_Item = Item(5);
 	m_pScene->RequestRefresh();
 	ASSERT_TRUE(Until([&] { return !Selected().empty(); }));
 	EXPECT_EQ(Selected(), Indices{5});
@@ -230,7 +229,7 @@ TEST_F(VViewTest, LosesNoClickToTheMouseThatGoesOn)
 
 TEST_F(VViewTest, GivesUpARectangleWithTheFocus)
 {
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}};
 	Show();
 	Press({10, 10}, Qt::AltModifier);
 	Drag({100, 100}, Qt::AltModifier);

@@ -6,6 +6,7 @@
 
 #include <QMouseEvent>
 #include <QQuickItem>
+#include <QQuickWindow>
 #include <QTest>
 
 #include <cmath>
@@ -116,11 +117,21 @@ void VBoxScene::InitialiseGL()
 		m_RenderList.push_back(std::make_shared<VBoxes>(*m_pShaderLibrary, m_pRegistry));
 }
 
+bool VBoxScene::Synchronise()
+{
+	m_Frame = m_Next;
+	return VFlowScene::Synchronise();
+}
+
 void VBoxScene::Refresh()
 {
 	++m_Refreshes;
 	m_pRegistry->Reset();
-	static_cast<VBoxes&>(*m_RenderList.front()).Update(m_Boxes, m_Size);
+	static_cast<VBoxes&>(*m_RenderList.front()).Update(m_Frame.m_Boxes, m_Size);
+	m_Overlay.m_SubjectLabels = m_Frame.m_SubjectLabels;
+	m_Overlay.m_PropLabels = m_Frame.m_PropLabels;
+	if (m_Frame.m_bYUp)
+		m_bFrameYUp = *m_Frame.m_bYUp;
 	VOrlexScene::Refresh();
 }
 
@@ -134,7 +145,13 @@ VViewTest::VViewTest()
 
 VViewTest::~VViewTest()
 {
+	Close();
+}
+
+void VViewTest::Close()
+{
 	m_pWidget.reset();
+	m_pWindow.reset();
 }
 
 void VViewTest::Show()
@@ -144,15 +161,20 @@ void VViewTest::Show()
 
 void VViewTest::Show(const std::shared_ptr<OrlexGraphics::VOrlexScene>& i_rpScene)
 {
-	m_pWidget = std::make_unique<QQuickWidget>();
-	m_pWidget->setResizeMode(QQuickWidget::SizeRootObjectToView);
 	m_pView = new OrlexGraphics::VSceneFramebufferObject;
 	m_pView->SetScene(i_rpScene.get());
 	m_pView->SetCameraType(CoreGraphics::ECameraFront);
-	m_pWidget->setContent(QUrl(), nullptr, m_pView);
-	m_pWidget->resize(c_Width, c_Height);
-	m_pWidget->show();
-	ASSERT_TRUE(QTest::qWaitForWindowExposed(m_pWidget.get()));
+	const auto show = [&](auto& io_rpWindow)
+	{
+		using VWindow = std::remove_reference_t<decltype(*io_rpWindow)>;
+		io_rpWindow = std::make_unique<VWindow>();
+		io_rpWindow->setResizeMode(VWindow::SizeRootObjectToView);
+		io_rpWindow->setContent(QUrl(), nullptr, m_pView);
+		io_rpWindow->resize(c_Width, c_Height);
+		io_rpWindow->show();
+		return QTest::qWaitForWindowExposed(io_rpWindow.get());
+	};
+	ASSERT_TRUE(qEnvironmentVariableIsSet("RETARGET_TEST_VIEW") ? show(m_pWindow) : show(m_pWidget));
 	ASSERT_TRUE(Until([&] { return m_pScene->m_Refreshes > 0 || i_rpScene != m_pScene; }));
 }
 
@@ -164,8 +186,38 @@ bool VViewTest::Until(const std::function<bool()>& i_rCondition)
 void VViewTest::Mouse(QEvent::Type i_Type, const QPoint& i_rPos, Qt::MouseButton i_Button, Qt::MouseButtons i_Buttons,
     Qt::KeyboardModifiers i_Modifiers)
 {
-	QMouseEvent event(i_Type, i_rPos, m_pWidget->mapToGlobal(i_rPos), i_Button, i_Buttons, i_Modifiers);
-	QCoreApplication::sendEvent(m_pWidget.get(), &event);
+	QObject* const pWindow = m_pWindow ? static_cast<QObject*>(m_pWindow.get()) : m_pWidget.get();
+	const QPoint global = m_pWindow ? m_pWindow->mapToGlobal(i_rPos) : m_pWidget->mapToGlobal(i_rPos);
+	QMouseEvent event(i_Type, i_rPos, global, i_Button, i_Buttons, i_Modifiers);
+	QCoreApplication::sendEvent(pWindow, &event);
+}
+
+QImage VViewTest::Grab()
+{
+	return m_pWindow ? m_pWindow->grabWindow() : m_pWidget->grabFramebuffer();
+}
+
+QRgb VViewTest::Pixel(int i_X, int i_Y)
+{
+	const QImage image = Grab();
+	const double ratio = m_pView->window()->effectiveDevicePixelRatio();
+	return image.pixel(static_cast<int>(i_X * ratio), static_cast<int>(i_Y * ratio));
+}
+
+void VViewTest::Leave()
+{
+	QEvent event(QEvent::Leave);
+	QCoreApplication::sendEvent(m_pWindow ? static_cast<QObject*>(m_pWindow.get()) : m_pWidget.get(), &event);
+}
+
+void VViewTest::Resize(int i_Width, int i_Height)
+{
+	m_pWindow ? m_pWindow->resize(i_Width, i_Height) : m_pWidget->resize(i_Width, i_Height);
+}
+
+void VViewTest::SetVisible(bool i_bVisible)
+{
+	m_pWindow ? m_pWindow->setVisible(i_bVisible) : m_pWidget->setVisible(i_bVisible);
 }
 
 bool VViewTest::Commit()

@@ -12,10 +12,13 @@
 #include "TesselPluginInterface/IDispatcher.h"
 
 #include <QImage>
+#include <QQuickView>
 #include <QQuickWidget>
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <functional>
+#include <optional>
 
 /// Runs what is posted in the event loop.
 class VEventLoopDispatcher : public TesselPluginInterface::IDispatcher
@@ -43,6 +46,15 @@ struct VBox
 	std::string m_Name = {};
 };
 
+/// What the user interface thread hands to a frame.
+struct VBoxFrame
+{
+	std::vector<VBox> m_Boxes;
+	std::vector<OrlexGraphics::VSubjectLabel> m_SubjectLabels;
+	std::vector<OrlexGraphics::VSubjectLabel> m_PropLabels;
+	std::optional<bool> m_bYUp;
+};
+
 /// Of boxes, and nothing else.
 class VBoxScene : public Flow2Graphics::VFlowScene
 {
@@ -50,20 +62,22 @@ public:
 	using VFlowScene::VFlowScene;
 
 	void InitialiseGL() override;
+	bool Synchronise() override;
 	void Refresh() override;
 
-	std::vector<VBox> m_Boxes;
+	/// Taken with the exchange before the next frame update.
+	VBoxFrame m_Next;
 	/// Of the view.
 	QSize m_Size;
-	bool m_bUp = false;
-	int m_Refreshes = 0;
+	std::atomic<int> m_Refreshes = 0;
 	using VFlowScene::m_bExactPick;
-	using VFlowScene::m_bFrameYUp;
-	using VFlowScene::m_Overlay;
-	using VFlowScene::m_pManipulator;
+
+private:
+	VBoxFrame m_Frame;
 };
 
-/// A window with one view, 200 by 160 pixels, from the front, of a scene of boxes.
+/// A window with one view, 200 by 160 pixels, from the front, of a scene of boxes. With RETARGET_TEST_VIEW in the
+/// environment it is a window of Qt Quick's own, which may draw on another thread, otherwise a widget.
 class VViewTest : public testing::Test
 {
 protected:
@@ -78,7 +92,13 @@ protected:
 
 	/// Runs the event loop until it holds.
 	static bool Until(const std::function<bool()>& i_rCondition);
-	QImage Grab() { return m_pWidget->grabFramebuffer(); }
+	QImage Grab();
+	/// Of what is shown now, by item pixels.
+	QRgb Pixel(int i_X, int i_Y);
+	void Leave();
+	void Resize(int i_Width, int i_Height);
+	void SetVisible(bool i_bVisible);
+	void Close();
 
 	void Mouse(QEvent::Type i_Type, const QPoint& i_rPos, Qt::MouseButton i_Button, Qt::MouseButtons i_Buttons,
 	    Qt::KeyboardModifiers i_Modifiers = {});
@@ -114,7 +134,8 @@ protected:
 	std::shared_ptr<CoreGraphics::VInteractionMapper> m_pMapper;
 	std::shared_ptr<VBoxScene> m_pScene;
 	std::unique_ptr<QQuickWidget> m_pWidget;
-	/// The widget owns it.
+	std::unique_ptr<QQuickView> m_pWindow;
+	/// The window owns it.
 	OrlexGraphics::VSceneFramebufferObject* m_pView = nullptr;
 };
 

@@ -14,57 +14,58 @@ constexpr QRgb c_Background = 0xff202020;
 TEST_F(VViewTest, DrawsTheBackgroundColour)
 {
 	Show(std::make_shared<OrlexGraphics::VOrlexScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false));
-	EXPECT_TRUE(Until([&] { return Grab().pixel(100, 80) == c_Background; }));
+	EXPECT_TRUE(Until([&] { return Pixel(100, 80) == c_Background; }));
 
 	// As QML writes it.
 	m_pView->GetSceneOptions()->insert("BackgroundColorRGB", 0x4080c0);
 	m_pView->OnSceneOptionsMapChanged("BackgroundColorRGB", 0x4080c0);
-	EXPECT_TRUE(Until([&] { return Grab().pixel(100, 80) == 0xff4080c0; }));
+	EXPECT_TRUE(Until([&] { return Pixel(100, 80) == 0xff4080c0; }));
 }
 
 TEST_F(VViewTest, DrawsPassesInTheirOrder)
 {
 	const QVector4D red(1, 0, 0, 1), green(0, 1, 0, 1), blue(0, 0, 1, 1);
-	m_pScene->m_Boxes = {
+	m_pScene->m_Next.m_Boxes = {
 	    {Item(1), {20, 20, 20, 20}, 100.0f, red},
 	    {Item(2), {30, 20, 20, 20}, 0.0f, green, OrlexGraphics::EPassTransparent},
 	    // Behind all, yet drawn over it.
 	    {Item(3), {20, 30, 20, 20}, -100.0f, blue, OrlexGraphics::EPassOverlay},
 	};
 	Show();
-	ASSERT_TRUE(Until([&] { return Grab().pixel(25, 25) == 0xffff0000; }));
-	EXPECT_EQ(Grab().pixel(35, 25), 0xffff0000) << "the depth of the first pass holds in the second one";
-	EXPECT_EQ(Grab().pixel(45, 25), 0xff00ff00);
-	EXPECT_EQ(Grab().pixel(25, 35), 0xff0000ff);
-	EXPECT_EQ(Grab().pixel(60, 60), c_Background);
+	ASSERT_TRUE(Until([&] { return Pixel(25, 25) == 0xffff0000; }));
+	EXPECT_EQ(Pixel(35, 25), 0xffff0000) << "the depth of the first pass holds in the second one";
+	EXPECT_EQ(Pixel(45, 25), 0xff00ff00);
+	EXPECT_EQ(Pixel(25, 35), 0xff0000ff);
+	EXPECT_EQ(Pixel(60, 60), c_Background);
 
 	m_pView->GetSceneOptions()->insert("3D", false);
 	m_pView->OnSceneOptionsMapChanged("3D", false);
-	ASSERT_TRUE(Until([&] { return Grab().pixel(25, 25) == c_Background; }));
-	EXPECT_EQ(Grab().pixel(25, 35), 0xff0000ff);
+	ASSERT_TRUE(Until([&] { return Pixel(25, 25) == c_Background; }));
+	EXPECT_EQ(Pixel(25, 35), 0xff0000ff);
 }
 
 TEST_F(VViewTest, OutlinesWhatIsSelectedAndWhatTheMousePointsAt)
 {
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}, {Item(3), {20, 100, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {
+	    {Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}, {Item(3), {20, 100, 40, 40}}};
 	Show();
-	ASSERT_TRUE(Until([&] { return Grab().pixel(40, 40) == 0xff0000ff; }));
+	ASSERT_TRUE(Until([&] { return Pixel(40, 40) == 0xff0000ff; }));
 	const QImage plain = Grab();
 
 	// Fill of a quarter of grey, and an edge of three quarters of white.
 	m_pSelection->Selection().Replace({Item(1)});
-	ASSERT_TRUE(Until([&] { return Grab().pixel(40, 40) == 0xff4040ff; }));
-	EXPECT_EQ(Grab().pixel(120, 40), 0xff0000ff) << "the other one is not selected";
-	EXPECT_GE(qRed(Grab().pixel(40, 20)), 200) << "edge";
-	EXPECT_EQ(Grab().pixel(10, 10), c_Background);
-	EXPECT_EQ(Grab().pixel(80, 40), c_Background);
+	ASSERT_TRUE(Until([&] { return Pixel(40, 40) == 0xff4040ff; }));
+	EXPECT_EQ(Pixel(120, 40), 0xff0000ff) << "the other one is not selected";
+	EXPECT_GE(qRed(Pixel(40, 20)), 200) << "edge";
+	EXPECT_EQ(Pixel(10, 10), c_Background);
+	EXPECT_EQ(Pixel(80, 40), c_Background);
 
 	// The first of two is the primary one: hatched.
 	m_pSelection->Selection().Add({Item(2)});
-	ASSERT_TRUE(Until([&] { return Grab().pixel(120, 40) == 0xff4040ff; }));
+	ASSERT_TRUE(Until([&] { return Pixel(120, 40) == 0xff4040ff; }));
 	int hatched = 0;
 	for (int x = 30; x < 50; ++x)
-		hatched += qRed(Grab().pixel(x, 40)) > 180 ? 1 : 0;
+		hatched += qRed(Pixel(x, 40)) > 180 ? 1 : 0;
 	EXPECT_GT(hatched, 6);
 	EXPECT_LT(hatched, 14);
 
@@ -87,8 +88,8 @@ TEST_F(VViewTest, OutlinesWhatIsSelectedAndWhatTheMousePointsAt)
 		const bool bSubtract = rRow.m_Modifiers == (Qt::ControlModifier | Qt::ShiftModifier);
 		m_pSelection->Selection().Replace(bSubtract ? std::vector{Item(3)} : std::vector<NVX::ISelectionItem>());
 		Mouse(QEvent::MouseMove, {40, 120}, Qt::NoButton, Qt::NoButton, rRow.m_Modifiers);
-		EXPECT_TRUE(Until([&] { return Grab().pixel(40, 120) == rRow.m_Fill; }))
-		    << std::hex << Grab().pixel(40, 120) << " instead of " << rRow.m_Fill;
+		EXPECT_TRUE(Until([&] { return Pixel(40, 120) == rRow.m_Fill; }))
+		    << std::hex << Pixel(40, 120) << " instead of " << rRow.m_Fill;
 		Hover({190, 150});
 		EXPECT_TRUE(Until([&] { return Preselected().empty(); }));
 	}
@@ -98,22 +99,25 @@ TEST_F(VViewTest, FollowsTheUpAxisOfFrameAndOperator)
 {
 	Show();
 	EXPECT_FALSE(m_pView->Options().m_bYUp);
-	m_pScene->m_bFrameYUp = true;
+	m_pScene->m_Next.m_bYUp = true;
 	m_pScene->RequestRefresh();
 	EXPECT_TRUE(Until([&] { return m_pView->GetSceneOptions()->value("YUp").toBool(); }));
 	EXPECT_TRUE(m_pScene->YUp());
 	EXPECT_TRUE(m_pView->Camera().m_bYUp);
 
+	m_pScene->m_Next.m_bYUp.reset();
 	m_pView->GetSceneOptions()->insert("YUp", false);
 	m_pView->OnSceneOptionsMapChanged("YUp", false);
 	EXPECT_FALSE(m_pScene->YUp());
-	EXPECT_TRUE(Until([&] { return !m_pScene->FrameYUp(); }));
-	EXPECT_FALSE(m_pView->Options().m_bYUp);
+	const int refreshes = m_pScene->m_Refreshes;
+	m_pScene->RequestRefresh();
+	ASSERT_TRUE(Until([&] { return m_pScene->m_Refreshes > refreshes; }));
+	EXPECT_FALSE(m_pView->Options().m_bYUp) << "a frame without an up axis leaves it as it was";
 }
 
 TEST_F(VViewTest, FramesTheSelection)
 {
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
 	m_pSelection->Selection().Replace({Item(2)});
 	Show();
 	EXPECT_FALSE(m_pView->property("focusSelection").toBool());
@@ -142,7 +146,7 @@ TEST_F(VViewTest, FramesTheSelection)
 
 TEST_F(VViewTest, TracksTheSelection)
 {
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
 	m_pSelection->Selection().Replace({Item(1)});
 	Show();
 	CoreGraphics::VCameraController& rCamera = m_pView->Camera();
@@ -171,8 +175,8 @@ TEST_F(VViewTest, TracksTheSelection)
 
 TEST_F(VViewTest, PlacesLabelsOverTheView)
 {
-	m_pScene->m_Overlay.m_SubjectLabels = {{"Actor", {0, 0, 0}, Item(1)}};
-	m_pScene->m_Overlay.m_PropLabels = {{"Ball", {0, 0, 200}, Item(2)}};
+	m_pScene->m_Next.m_SubjectLabels = {{"Actor", {0, 0, 0}, Item(1)}};
+	m_pScene->m_Next.m_PropLabels = {{"Ball", {0, 0, 200}, Item(2)}};
 	Show();
 	QSignalSpy subjects(m_pView, &OrlexGraphics::VSceneFramebufferObject::SubjectsChanged);
 	ASSERT_TRUE(Until([&] { return m_pView->GetSubjectObjects().size() == 2; }));
@@ -191,18 +195,18 @@ TEST_F(VViewTest, EndsItsRenderersWithTheirWindows)
 	using OrlexGraphics::VSceneFramebufferRenderer;
 	const std::uint64_t living = VSceneFramebufferRenderer::LivingCount();
 	const std::uint64_t made = VSceneFramebufferRenderer::MadeCount();
-	m_pScene->m_Boxes = {{Item(1), {20, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}};
 	m_pSelection->Selection().Replace({Item(1)});
 	for (int i = 0; i < 5; ++i)
 	{
 		Show();
-		ASSERT_TRUE(Until([&] { return Grab().pixel(40, 40) == 0xff4040ff; })) << i;
-		m_pWidget->resize(0, 0);
-		m_pWidget->hide();
-		m_pWidget->resize(300, 200);
-		m_pWidget->show();
-		ASSERT_TRUE(Until([&] { return Grab().pixel(290, 190) == c_Background; })) << i;
-		m_pWidget.reset();
+		ASSERT_TRUE(Until([&] { return Pixel(40, 40) == 0xff4040ff; })) << i;
+		Resize(0, 0);
+		SetVisible(false);
+		Resize(300, 200);
+		SetVisible(true);
+		ASSERT_TRUE(Until([&] { return Pixel(290, 190) == c_Background; })) << i;
+		Close();
 		EXPECT_EQ(VSceneFramebufferRenderer::LivingCount(), living) << i;
 		EXPECT_EQ(m_pScene.use_count(), 1) << i;
 	}

@@ -3,8 +3,8 @@
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypesUtils/EulerToAngleAxis.h"
 #include "CoreOrlexTypesUtils/Expectation.h"
+#include "CoreOrlexTypesUtils/JointStatistics.h"
 
-#include "DebugServices/GlobalLog.h"
 #include "numerics/AllFinite.h"
 #include "numerics/fnl_symmetric_eigensystem.h"
 
@@ -17,11 +17,6 @@ namespace CoreOrlexTypesUtils::TemplateSubjectUtils
 
 namespace
 {
-
-using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
-using Rotation::VMatrix3;
-using Rotation::VVector3;
-using VNumbers = std::vector<double>;
 
 struct VCosSin
 {
@@ -128,12 +123,6 @@ std::array<double, 2> EllipseExtents(const VNumbers& i_rEllipseMat)
 	return {std::sqrt(std::max(i_rEllipseMat[0], 0.0)), std::sqrt(std::max(i_rEllipseMat[3], 0.0))};
 }
 
-bool Refuse(const char* i_pMessage)
-{
-	NVX_LOG("SubjectUtils", NVX::ELogError, i_pMessage);
-	return false;
-}
-
 constexpr const char* c_pUnknownType = "Cannot convert ranges: unsupported joint type";
 constexpr const char* c_pNotFinite = "Cannot convert ranges: a value is not finite";
 
@@ -183,16 +172,12 @@ bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const
 	if (i_JointType == VJoint::EBall)
 	{
 		NVX_ASSERT(!"Range conversion from MinMax to axis angle not supported on a ball joint");
-		NVX_LOG(
-		    "SubjectUtils", NVX::ELogError, "Range conversion from MinMax to axis angle not supported on a ball joint");
-		return false;
+		return Refuse("Range conversion from MinMax to axis angle not supported on a ball joint");
 	}
 	if (i_JointType == VJoint::EFree)
 	{
 		NVX_ASSERT(!"Range conversion from MinMax to axis angle not supported on a free joint");
-		NVX_LOG(
-		    "SubjectUtils", NVX::ELogError, "Range conversion from MinMax to axis angle not supported on a free joint");
-		return false;
+		return Refuse("Range conversion from MinMax to axis angle not supported on a free joint");
 	}
 	if (!CoreOrlexTypes::IsJointType(i_JointType))
 		return Refuse(c_pUnknownType);

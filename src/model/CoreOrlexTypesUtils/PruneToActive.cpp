@@ -2,6 +2,7 @@
 
 #include "CoreOrlexTypesUtils/Expectation.h"
 #include "CoreOrlexTypesUtils/Renumbering.h"
+#include "CoreOrlexTypesUtils/RigidBodyRefusal.h"
 #include "CoreOrlexTypesUtils/SubjectKind.h"
 
 #include "DebugServices/GlobalLog.h"
@@ -18,8 +19,6 @@ using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
 using VIndices = std::vector<std::uint32_t>;
-
-constexpr std::size_t c_MarkersOfBody = 3;
 
 /// Cuts the elements of i_Size values behind the first i_Begin; a list of another size is left alone.
 template <typename T>
@@ -58,7 +57,7 @@ bool LoseMarkers(typename TSubject::VTarget& io_rTarget, const VRenumbering& i_r
 		CutTemplates(io_rTarget, keep);
 	}
 	Cut(io_rTarget.m_MarkerIndices, keep, 0, 1);
-	return kept >= (io_rTarget.m_Type == TSubject::VTarget::ERigidBody ? c_MarkersOfBody : 1);
+	return kept >= (io_rTarget.m_Type == TSubject::VTarget::ERigidBody ? RigidBodyUtils::c_MarkersOfBody : 1);
 }
 
 bool LoseRotations(VIndices& io_rIndices, const VRenumbering& i_rRenumbering)

@@ -3,8 +3,8 @@
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypesUtils/EulerToAngleAxis.h"
 #include "CoreOrlexTypesUtils/Expectation.h"
+#include "CoreOrlexTypesUtils/JointStatistics.h"
 
-#include "DebugServices/GlobalLog.h"
 #include "numerics/AllFinite.h"
 #include "numerics/UnscentedTransform.h"
 #include "numerics/fnl_svd_fixed.h"
@@ -16,11 +16,6 @@ namespace CoreOrlexTypesUtils::TemplateSubjectUtils
 
 namespace
 {
-
-using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
-using Rotation::VMatrix3;
-using Rotation::VVector3;
-using VNumbers = std::vector<double>;
 
 /// The logarithms of the smallest and the largest standard deviation.
 struct VStiffnessRule
@@ -45,11 +40,7 @@ double VarianceOf(const VStiffnessRule& i_rRule, double i_Stiffness)
 	return deviation * deviation;
 }
 
-bool TellNotFinite()
-{
-	NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert statistics: a value is not finite");
-	return false;
-}
+constexpr const char* c_pNotFinite = "Cannot convert statistics: a value is not finite";
 
 /// Relative to the larger of the largest eigenvalue and 1: a rotation that is more certain than that in some direction
 /// is the work of a gimbal lock, where the angles leave one direction out, and rounding would make it negative.
@@ -101,7 +92,7 @@ bool ToRestPose(const VNumbers& i_rMean, const VNumbers& i_rCovariance, VNumbers
 	o_rRestPose = i_rMean;
 	std::copy(angles.begin(), angles.end(), o_rRestPose.begin());
 	if (!AllFinite(o_rRestPose))
-		return TellNotFinite();
+		return Refuse(c_pNotFinite);
 
 	const VMatrix3 inverse = fnl_svd_fixed<3, 3>(TurnsOfAngles(angles)).Inverse(c_GimbalLock);
 	const VMatrix3 ofAngles = Rotation::Product(
@@ -158,7 +149,7 @@ bool FromRestPose(const VNumbers& i_rRestPose, const VNumbers& i_rStiffness, VNu
 	std::copy(mean.begin(), mean.end(), o_rMean.begin());
 	o_rCovariance.assign(AACovariance.begin(), AACovariance.end());
 	if (!AllFinite(o_rCovariance))
-		return TellNotFinite();
+		return Refuse(c_pNotFinite);
 	KeepPositive<t_Size>(o_rCovariance);
 	return true;
 }
@@ -172,12 +163,9 @@ bool MeanCovarianceToRestPoseStiffness(VJoint::EJointType i_JointType, const VNu
 	bool bFits = Expect(Dof == i_rMeanPose.size(), "Dof == i_rMeanPose.size()");
 	bFits &= Expect((Dof * Dof) == i_rCovariance.size(), "( Dof*Dof ) == i_rCovariance.size()");
 	if (!CoreOrlexTypes::IsJointType(i_JointType))
-	{
-		NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert statistics: unsupported joint type");
-		return false;
-	}
+		return Refuse("Cannot convert statistics: unsupported joint type");
 	if (bFits && (!AllFinite(i_rMeanPose) || !AllFinite(i_rCovariance)))
-		return TellNotFinite();
+		return Refuse(c_pNotFinite);
 
 	o_rRestPose.assign(Dof, 0.0);
 	o_rStiffness.assign(Dof, 0.0);
@@ -201,12 +189,9 @@ bool RestPoseStiffnessToMeanCovariance(VJoint::EJointType i_JointType, const VNu
 	bool bFits = Expect(i_rRestPose.size() == DoF, "i_rRestPose.size() == DoF");
 	bFits &= Expect(i_rStiffness.size() == DoF, "i_rStiffness.size() == DoF");
 	if (!CoreOrlexTypes::IsJointType(i_JointType))
-	{
-		NVX_LOG("SubjectUtils", NVX::ELogError, "Cannot convert stats: unsupported joint type");
-		return false;
-	}
+		return Refuse("Cannot convert stats: unsupported joint type");
 	if (bFits && (!AllFinite(i_rRestPose) || !AllFinite(i_rStiffness)))
-		return TellNotFinite();
+		return Refuse(c_pNotFinite);
 
 	o_rMean.assign(DoF, 0.0);
 	o_rCovariance.assign(DoF * DoF, 0.0);

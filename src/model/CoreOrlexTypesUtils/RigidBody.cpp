@@ -1,5 +1,6 @@
 #include "CoreOrlexTypesUtils/RigidBody.h"
 
+#include "CoreOrlexTypesUtils/RigidBodyRefusal.h"
 #include "CoreOrlexTypesUtils/StaticExpressionParser.h"
 
 #include "DebugServices/GlobalLog.h"
@@ -18,16 +19,8 @@ using CoreOrlexTypes::VSubjectParametrised;
 using Rotation::VMatrix3;
 using Rotation::VVector3;
 
-constexpr std::size_t c_MarkersOfBody = 3;
-
 /// Of a marker that nothing is known about, in mm squared.
 constexpr VMatrix3 c_DefaultCovariance{5.0, 0, 0, 0, 5.0, 0, 0, 0, 5.0};
-
-bool Refuse(const char* i_pMessage)
-{
-	NVX_LOG("RigidBodyUtils", NVX::ELogError, i_pMessage);
-	return false;
-}
 
 const std::vector<double>& StateOf(const VSubject::VTarget& i_rTarget)
 {

@@ -1,5 +1,7 @@
 #include "CoreOrlexTypesUtils/RigidBodyAttachment.h"
 
+#include "CoreOrlexTypesUtils/RigidBodyRefusal.h"
+
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/NameHash.h"
 #include "CoreOrlexTypesUtils/Expectation.h"
@@ -10,8 +12,6 @@
 #include "CoreOrlexTypesUtils/SubjectKind.h"
 #include "CoreOrlexTypesUtils/TargetFrames.h"
 #include "CoreOrlexTypesUtils/UnusedParameters.h"
-
-#include "DebugServices/GlobalLog.h"
 
 #include <algorithm>
 #include <set>
@@ -28,13 +28,6 @@ using CoreOrlexTypes::VSubjectParametrised;
 using Rotation::VMatrix3;
 using Rotation::VVector3;
 using VPose = Rotation::VPose<double>;
-
-template <typename... VArguments>
-bool Refuse(const char* i_pMessage, const VArguments&... i_rArguments)
-{
-	NVX_LOG("RigidBodyUtils", NVX::ELogError, i_pMessage, i_rArguments...);
-	return false;
-}
 
 template <typename TSubject>
 bool GoTogether(const TSubject& i_rSubject, const VSubjectApplicationData& i_rAppData)

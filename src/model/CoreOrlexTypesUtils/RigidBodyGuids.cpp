@@ -1,5 +1,6 @@
 #include "CoreOrlexTypesUtils/RigidBodyGuids.h"
 
+#include "CoreOrlexTypesUtils/RigidBodyRefusal.h"
 #include "CoreOrlexTypesUtils/ScalingRules.h"
 #include "CoreOrlexTypesUtils/StaticExpressionParser.h"
 
@@ -17,13 +18,6 @@ namespace
 
 using CoreOrlexTypes::VSubjectParametrised;
 using VParameter = VSubjectParametrised::VStaticParameter;
-
-template <typename... VArguments>
-bool Refuse(const char* i_pMessage, const VArguments&... i_rArguments)
-{
-	NVX_LOG("RigidBodyUtils", NVX::ELogError, i_pMessage, i_rArguments...);
-	return false;
-}
 
 /// 8-4-4-4-12 hexadecimal digits.
 bool IsGuid(const std::string& i_rName)

@@ -3,6 +3,7 @@
 #include "CoreOrlexTypesUtils/Expectation.h"
 #include "CoreOrlexTypesUtils/RigidBody.h"
 #include "CoreOrlexTypesUtils/RigidBodyFrames.h"
+#include "CoreOrlexTypesUtils/RigidBodyRefusal.h"
 #include "CoreOrlexTypesUtils/SubjectKind.h"
 #include "CoreOrlexTypesUtils/TargetFrames.h"
 #include "CoreOrlexTypesUtils/UnusedParameters.h"
@@ -23,14 +24,6 @@ using CoreOrlexTypes::VSubjectParametrised;
 using Rotation::VMatrix3;
 using Rotation::VVector3;
 using VPose = Rotation::VPose<double>;
-
-constexpr std::size_t c_MarkersOfBody = 3;
-
-bool Refuse(const char* i_pMessage)
-{
-	NVX_LOG("RigidBodyUtils", NVX::ELogError, i_pMessage);
-	return false;
-}
 
 template <typename TSubject>
 bool HasBodyTarget(const TSubject& i_rSubject)

@@ -7,8 +7,8 @@
 namespace CoreOrlexTypesUtils
 {
 
-/// A renumbering that drops the markers, or rotation observations, that no target names; the others keep their order. For both subject
-/// types, TSubject.
+/// A renumbering that drops the markers, or rotation observations, that no target names; the others keep their order.
+/// For both subject types, TSubject.
 template <typename TSubject>
 VRenumbering NamedMarkers(const TSubject& i_rSubject);
 template <typename TSubject>

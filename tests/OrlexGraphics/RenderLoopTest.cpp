@@ -1,0 +1,37 @@
+#include <QCoreApplication>
+#include <QProcess>
+#include <gtest/gtest.h>
+
+namespace
+{
+
+/// Qt takes its render loop and its scale once for a process, so each of them is a process of its own.
+TEST(RenderLoops, ShowAndPickTheSame)
+{
+	constexpr const char* c_pTests =
+	    "VViewTest.Selects*:VViewTest.Shows*:VViewTest.Draws*:VViewTest.Tracks*:VViewTest.Ends*";
+	const struct
+	{
+		const char* m_pName;
+		std::vector<std::pair<const char*, const char*>> m_Variables;
+	} rows[] = {
+	    {"window, drawn on this thread", {{"RETARGET_TEST_VIEW", "1"}, {"QSG_RENDER_LOOP", "basic"}}},
+	    {"window, drawn on another thread", {{"RETARGET_TEST_VIEW", "1"}, {"QSG_RENDER_LOOP", "threaded"}}},
+	    {"display of double resolution", {{"QT_SCALE_FACTOR", "2"}}},
+	};
+	for (const auto& rRow : rows)
+	{
+		QProcess process;
+		QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+		for (const auto& [pName, pValue] : rRow.m_Variables)
+			environment.insert(pName, pValue);
+		process.setProcessEnvironment(environment);
+		process.setProcessChannelMode(QProcess::MergedChannels);
+		process.start(QCoreApplication::applicationFilePath(), {QString("--gtest_filter=") + c_pTests});
+		ASSERT_TRUE(process.waitForFinished(300000)) << rRow.m_pName;
+		EXPECT_EQ(process.exitCode(), 0) << rRow.m_pName << "\n" << process.readAll().toStdString();
+		EXPECT_EQ(process.exitStatus(), QProcess::NormalExit) << rRow.m_pName;
+	}
+}
+
+} // namespace
