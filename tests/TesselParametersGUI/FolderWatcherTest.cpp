@@ -212,6 +212,12 @@ TEST_F(FolderWatcher, FollowsTheSystemsNotices)
 	EXPECT_TRUE(becomes({"b", "c"}));
 	remove(m_Folder / "User/b.qrs");
 	EXPECT_TRUE(becomes({"c"}));
+	// By the name of a folder above.
+	const boost::filesystem::path other = m_Folder.Path().string() + "-renamed";
+	rename(m_Folder.Path(), other);
+	EXPECT_TRUE(becomes({}));
+	rename(other, m_Folder.Path());
+	EXPECT_TRUE(becomes({"c"}));
 	remove_all(m_Folder / "User");
 	EXPECT_TRUE(becomes({}));
 	create_directory(m_Folder / "User");

@@ -32,15 +32,6 @@ QString ToQString(const boost::filesystem::path& i_rPath)
 	return QString::fromStdString(UtilsFileSystem::ToUtf8(i_rPath));
 }
 
-/// The folder above that exists; empty if there is none.
-boost::filesystem::path FolderAbove(boost::filesystem::path i_Path)
-{
-	do
-		i_Path = i_Path.parent_path();
-	while (!i_Path.empty() && !IsFolder(i_Path));
-	return i_Path;
-}
-
 } // namespace
 
 VParameterEnumFolderWatcher::VParameterEnumFolderWatcher(std::shared_ptr<TesselPluginInterface::IDataStore> i_pStore,
@@ -185,6 +176,7 @@ void VParameterEnumFolderWatcher::ClearVanishedValue(const VFolderState* i_pBefo
 
 void VParameterEnumFolderWatcher::Watch()
 {
+	std::set<QString> folders;
 	std::set<QString> wanted;
 	for (const VWatchedFolder& rFolder : m_Folders)
 	{
@@ -193,17 +185,18 @@ void VParameterEnumFolderWatcher::Watch()
 		const VStamp stamp = Stamp(rFolder.m_Folder);
 		if (std::exchange(m_Stamps[rFolder.m_Folder], stamp) != stamp)
 			m_pWatcher->removePath(ToQString(rFolder.m_Folder));
-		if (IsFolder(rFolder.m_Folder))
-			wanted.insert(ToQString(rFolder.m_Folder));
-		if (const boost::filesystem::path above = FolderAbove(rFolder.m_Folder); !above.empty())
-			wanted.insert(ToQString(above));
+		folders.insert(ToQString(rFolder.m_Folder));
+		for (boost::filesystem::path path = rFolder.m_Folder; !path.empty(); path = path.parent_path())
+			if (IsFolder(path))
+				wanted.insert(ToQString(path));
 	}
 	for (const QString& rWatched : m_pWatcher->directories())
 		if (wanted.erase(rWatched) == 0)
 			m_pWatcher->removePath(rWatched);
-	for (const QString& rFolder : wanted)
-		if (!m_pWatcher->addPath(rFolder))
-			NVX_LOG("Tessel", NVX::ELogWarning, "Folder [%s] cannot be watched for changes", rFolder.toStdString());
+	for (const QString& rPath : wanted)
+		// One above may be closed to this user.
+		if (!m_pWatcher->addPath(rPath) && folders.contains(rPath))
+			NVX_LOG("Tessel", NVX::ELogWarning, "Folder [%s] cannot be watched for changes", rPath.toStdString());
 }
 
 VParameterEnumFolderWatcher::VStamp VParameterEnumFolderWatcher::Stamp(const boost::filesystem::path& i_rFolder)

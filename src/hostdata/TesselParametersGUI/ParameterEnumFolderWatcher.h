@@ -72,7 +72,7 @@ private:
 	void Accept(VFolderState i_State);
 	/// @param i_pBefore null at the first time.
 	void ClearVanishedValue(const VFolderState* i_pBefore);
-	/// The folders, and those above them, where a folder that is gone would appear again.
+	/// The folders, and all above them: there they are renamed, and there one that is gone would appear again.
 	void Watch();
 
 	const std::string m_Extension;
