@@ -9,16 +9,53 @@
 namespace CoreGraphics
 {
 
-struct VStaticBuffer::VObject
+namespace
 {
-	explicit VObject(std::uint32_t i_Type) : m_Buffer(static_cast<QOpenGLBuffer::Type>(i_Type)) {}
 
+/// A buffer of the share group that it was last bound in.
+class VGroupBuffer
+{
+public:
+	explicit VGroupBuffer(QOpenGLBuffer::Type i_Type) : m_Buffer(i_Type) {}
+
+	/// @return true if it is new in the group, and has no content yet
+	bool Bind(QOpenGLBuffer::UsagePattern i_Usage)
+	{
+		QOpenGLContextGroup* const pGroup = QOpenGLContext::currentContext()->shareGroup();
+		if (m_pGroup == pGroup)
+		{
+			m_Buffer.bind();
+			return false;
+		}
+		m_Buffer = QOpenGLBuffer(m_Buffer.type());
+		m_Buffer.create();
+		m_Buffer.bind();
+		m_Buffer.setUsagePattern(i_Usage);
+		m_pGroup = pGroup;
+		return true;
+	}
+
+	void Fill(const void* i_pBytes, std::size_t i_Size) { m_Buffer.allocate(i_pBytes, static_cast<int>(i_Size)); }
+
+private:
 	QOpenGLBuffer m_Buffer;
 	QPointer<QOpenGLContextGroup> m_pGroup;
 };
 
+} // namespace
+
+struct VStaticBuffer::VObject : VGroupBuffer
+{
+	using VGroupBuffer::VGroupBuffer;
+};
+
+struct VStreamBuffer::VObject : VGroupBuffer
+{
+	using VGroupBuffer::VGroupBuffer;
+};
+
 VStaticBuffer::VStaticBuffer(std::uint32_t i_Type, std::vector<std::uint8_t> i_Bytes)
-    : m_Bytes(std::move(i_Bytes)), m_pObject(std::make_unique<VObject>(i_Type))
+    : m_Bytes(std::move(i_Bytes)), m_pObject(std::make_unique<VObject>(static_cast<QOpenGLBuffer::Type>(i_Type)))
 {
 }
 
@@ -28,18 +65,17 @@ VStaticBuffer::~VStaticBuffer() = default;
 
 void VStaticBuffer::Bind()
 {
-	QOpenGLContextGroup* pGroup = QOpenGLContext::currentContext()->shareGroup();
-	if (m_pObject->m_pGroup == pGroup)
-	{
-		m_pObject->m_Buffer.bind();
-		return;
-	}
-	m_pObject = std::make_unique<VObject>(m_pObject->m_Buffer.type());
-	m_pObject->m_Buffer.create();
-	m_pObject->m_Buffer.bind();
-	m_pObject->m_Buffer.setUsagePattern(QOpenGLBuffer::StaticDraw);
-	m_pObject->m_Buffer.allocate(m_Bytes.data(), static_cast<int>(m_Bytes.size()));
-	m_pObject->m_pGroup = pGroup;
+	if (m_pObject->Bind(QOpenGLBuffer::StaticDraw))
+		m_pObject->Fill(m_Bytes.data(), m_Bytes.size());
+}
+
+VStreamBuffer::VStreamBuffer() : m_pObject(std::make_unique<VObject>(QOpenGLBuffer::VertexBuffer)) {}
+VStreamBuffer::~VStreamBuffer() = default;
+
+void VStreamBuffer::Upload(const void* i_pBytes, std::size_t i_Size)
+{
+	m_pObject->Bind(QOpenGLBuffer::StreamDraw);
+	m_pObject->Fill(i_pBytes, i_Size);
 }
 
 VVertexBuffer::VVertexBuffer(VVertexFormat i_Format, std::vector<std::uint8_t> i_Bytes)

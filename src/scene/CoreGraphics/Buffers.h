@@ -41,6 +41,21 @@ private:
 	std::unique_ptr<VObject> m_pObject;
 };
 
+/// Vertices that are others in each frame.
+class VStreamBuffer
+{
+public:
+	VStreamBuffer();
+	~VStreamBuffer();
+
+	/// Binds the buffer with these bytes in it. Needs the context to be current.
+	void Upload(const void* i_pBytes, std::size_t i_Size);
+
+private:
+	struct VObject;
+	std::unique_ptr<VObject> m_pObject;
+};
+
 /// The vertices of a shape.
 class VVertexBuffer : public VStaticBuffer
 {
