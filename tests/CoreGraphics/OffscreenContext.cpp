@@ -1,33 +1,9 @@
 #include "OffscreenContext.h"
 
-#include <QGuiApplication>
 #include <QSurfaceFormat>
-
-#include <memory>
 
 namespace GraphicsTest
 {
-
-namespace
-{
-
-/// Windows and contexts need the application; it ends with the last test.
-class VApplication : public testing::Environment
-{
-public:
-	void SetUp() override { m_pApplication = std::make_unique<QGuiApplication>(m_Count, m_pArguments); }
-	void TearDown() override { m_pApplication.reset(); }
-
-private:
-	char m_Name[5] = "test";
-	char* m_pArguments[2] = {m_Name, nullptr};
-	int m_Count = 1;
-	std::unique_ptr<QGuiApplication> m_pApplication;
-};
-
-[[maybe_unused]] testing::Environment* const g_pApplication = testing::AddGlobalTestEnvironment(new VApplication);
-
-} // namespace
 
 VOffscreenContext::VOffscreenContext(EDialect i_Dialect, QOpenGLContext* i_pShare)
 {

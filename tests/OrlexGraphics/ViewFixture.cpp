@@ -113,8 +113,10 @@ NVX::ISelectionItem Item(std::uint32_t i_Index, std::uint32_t i_Kind)
 void VBoxScene::InitialiseGL()
 {
 	VFlowScene::InitialiseGL();
-	if (m_RenderList.empty())
-		m_RenderList.push_back(std::make_shared<VBoxes>(*m_pShaderLibrary, m_pRegistry));
+	if (m_pBoxes)
+		return;
+	m_pBoxes = std::make_shared<VBoxes>(*m_pShaderLibrary, m_pRegistry);
+	m_RenderList.push_back(m_pBoxes);
 }
 
 bool VBoxScene::Synchronise()
@@ -127,7 +129,7 @@ void VBoxScene::Refresh()
 {
 	++m_Refreshes;
 	m_pRegistry->Reset();
-	static_cast<VBoxes&>(*m_RenderList.front()).Update(m_Frame.m_Boxes, m_Size);
+	static_cast<VBoxes&>(*m_pBoxes).Update(m_Frame.m_Boxes, m_Size);
 	m_Overlay.m_SubjectLabels = m_Frame.m_SubjectLabels;
 	m_Overlay.m_PropLabels = m_Frame.m_PropLabels;
 	if (m_Frame.m_bYUp)

@@ -74,6 +74,7 @@ public:
 
 private:
 	VBoxFrame m_Frame;
+	std::shared_ptr<OrlexGraphics::IRenderType> m_pBoxes;
 };
 
 /// A window with one view, 200 by 160 pixels, from the front, of a scene of boxes. With RETARGET_TEST_VIEW in the

@@ -1,5 +1,6 @@
 #include "Flow2Graphics/FlowScene.h"
 
+#include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/RenderOutlines.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 
@@ -17,8 +18,13 @@ void VFlowScene::SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame>
 void VFlowScene::InitialiseGL()
 {
 	VOrlexScene::InitialiseGL();
-	if (m_PostList.empty())
-		m_PostList.push_back(std::make_shared<OrlexGraphics::VRenderOutlines>(*m_pShaderLibrary, m_pRegistry));
+	if (m_pRenderManipulator)
+		return;
+	m_pRenderManipulator =
+	    std::make_shared<OrlexGraphics::VRenderManipulator>(*m_pShaderLibrary, m_pRegistry, SelectionManager());
+	m_pManipulator = m_pRenderManipulator;
+	m_RenderList.push_back(m_pRenderManipulator);
+	m_PostList.push_back(std::make_shared<OrlexGraphics::VRenderOutlines>(*m_pShaderLibrary, m_pRegistry));
 }
 
 bool VFlowScene::Synchronise()
@@ -32,6 +38,8 @@ bool VFlowScene::Synchronise()
 void VFlowScene::Refresh()
 {
 	Registry().Reset();
+	if (m_pRenderManipulator)
+		m_pRenderManipulator->AllocateIds();
 	VOrlexScene::Refresh();
 }
 

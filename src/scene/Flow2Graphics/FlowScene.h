@@ -4,6 +4,11 @@
 #include "OrlexGraphics/OrlexScene.h"
 #include "TesselPluginInterface/IFlowFrame.h"
 
+namespace OrlexGraphics
+{
+class VRenderManipulator;
+}
+
 namespace Flow2Graphics
 {
 
@@ -15,6 +20,9 @@ class VFlowScene : public OrlexGraphics::VOrlexScene
 public:
 	using VOrlexScene::VOrlexScene;
 	~VFlowScene() override;
+
+	/// Null before the first frame.
+	const std::shared_ptr<OrlexGraphics::VRenderManipulator>& RenderManipulator() const { return m_pRenderManipulator; }
 
 	/// What is to be shown from the next exchange on. User interface thread.
 	void SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame);
@@ -31,6 +39,7 @@ public:
 	    const std::vector<std::uint32_t>& i_rIds, std::vector<std::string>& o_rNames) const override;
 
 private:
+	std::shared_ptr<OrlexGraphics::VRenderManipulator> m_pRenderManipulator;
 	/// Of the user interface thread.
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pPendingFrame;
 	/// Of the render thread.

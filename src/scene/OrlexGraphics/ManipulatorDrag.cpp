@@ -44,14 +44,16 @@ std::optional<QPointF> OnScreen(const VCameraController& i_rCamera, const QVecto
 std::optional<VMouseRay> MakeMouseRay(const VCameraController& i_rCamera, const QPointF& i_rMouse)
 {
 	bool bInvertible = false;
-	const QMatrix4x4 inverse = (i_rCamera.m_Projection * i_rCamera.m_View).inverted(&bInvertible);
+	const QMatrix4x4 fromClip = i_rCamera.m_Projection.inverted(&bInvertible);
 	if (!bInvertible || i_rCamera.m_Size.isEmpty())
 		return {};
 	const auto x = static_cast<float>(2.0 * i_rMouse.x() / i_rCamera.m_Size.width() - 1.0);
 	const auto y = static_cast<float>(1.0 - 2.0 * i_rMouse.y() / i_rCamera.m_Size.height());
-	const QVector3D from = inverse.map(QVector3D(x, y, 2.0f * c_NearDepth - 1.0f));
-	const QVector3D to = inverse.map(QVector3D(x, y, 2.0f * c_FarDepth - 1.0f));
-	return VMouseRay{from, (to - from).normalized()};
+	// The direction is taken in the space of the eye, where the two points are not lost in the eye's own distance.
+	const QVector3D from = fromClip.map(QVector3D(x, y, 2.0f * c_NearDepth - 1.0f));
+	const QVector3D to = fromClip.map(QVector3D(x, y, 2.0f * c_FarDepth - 1.0f));
+	const QMatrix4x4 fromEye = i_rCamera.m_View.inverted();
+	return VMouseRay{fromEye.map(from), fromEye.mapVector(to - from).normalized()};
 }
 
 std::optional<QVector3D> PointOnLine(const VMouseRay& i_rRay, const QVector3D& i_rPoint, const QVector3D& i_rDirection)

@@ -4,9 +4,7 @@
 #include "CoreGraphics/ShaderLibrary.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 
-#include <QOpenGLBuffer>
 #include <QOpenGLContext>
-#include <QPointer>
 
 #include <algorithm>
 #include <cmath>
@@ -40,32 +38,12 @@ std::uint8_t Byte(float i_Value)
 
 } // namespace
 
-/// The points' buffer, which is filled anew for each walk.
-struct VSphereHelper::VStream
-{
-	QOpenGLBuffer m_Buffer{QOpenGLBuffer::VertexBuffer};
-	QPointer<QOpenGLContextGroup> m_pGroup;
-
-	void Fill(const std::vector<VSplat>& i_rSplats)
-	{
-		if (QOpenGLContextGroup* const pGroup = QOpenGLContextGroup::currentContextGroup(); m_pGroup != pGroup)
-		{
-			m_Buffer = QOpenGLBuffer(QOpenGLBuffer::VertexBuffer);
-			m_Buffer.setUsagePattern(QOpenGLBuffer::StreamDraw);
-			m_Buffer.create();
-			m_pGroup = pGroup;
-		}
-		m_Buffer.bind();
-		m_Buffer.allocate(i_rSplats.data(), static_cast<int>(i_rSplats.size() * sizeof(VSplat)));
-	}
-};
-
 VSphereHelper::VSphereHelper(
     CoreGraphics::VShaderLibrary& io_rLibrary, std::shared_ptr<const VSelectionRegistry> i_pRegistry)
     : m_pRegistry(std::move(i_pRegistry)), m_Spheres{CoreGraphics::MakeSphere(0), CoreGraphics::MakeSphere(1),
                                                CoreGraphics::MakeSphere(2), CoreGraphics::MakeSphere(3)},
       m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, "Sphere", "SimpleLighting")),
-      m_pPointProgram(io_rLibrary.GetProgram("Point3D", "Colour")), m_pStream(std::make_unique<VStream>())
+      m_pPointProgram(io_rLibrary.GetProgram("Point3D", "Colour"))
 {
 	m_State.m_Cull = CoreGraphics::ECullBack;
 	m_State.m_bDepthTest = true;
@@ -112,8 +90,7 @@ void VSphereHelper::Draw(CoreGraphics::VRenderContext& io_rContext, const QVecto
 			splat.m_Colour[i] =
 			    bSelection ? static_cast<std::uint8_t>(i_rId.m_Id >> (8 * i) & 0xff) : Byte(i_rColour[i]);
 		m_Splats.push_back(splat);
-		if (io_rContext.m_Mode == CoreGraphics::ERenderPick)
-			m_PickPoints.push_back({clip.x(), clip.y(), clip.w(), i_rId.m_Id});
+		AddPickPoint(io_rContext, i_rSphere.toVector3D(), i_rId);
 		return;
 	}
 	if (!m_bUsable)
@@ -129,11 +106,20 @@ void VSphereHelper::Draw(CoreGraphics::VRenderContext& io_rContext, const QVecto
 	io_rContext.DrawElements(GL_TRIANGLES, rSphere.m_Indices);
 }
 
+void VSphereHelper::AddPickPoint(
+    const CoreGraphics::VRenderContext& i_rContext, const QVector3D& i_rPlace, const CoreGraphics::VSelectionId& i_rId)
+{
+	if (i_rContext.m_Mode != CoreGraphics::ERenderPick)
+		return;
+	const QVector4D clip = i_rContext.m_Projection * (i_rContext.m_View * QVector4D(i_rPlace, 1.0f));
+	m_PickPoints.push_back({clip.x(), clip.y(), clip.w(), i_rId.m_Id});
+}
+
 void VSphereHelper::End(CoreGraphics::VRenderContext& io_rContext)
 {
 	if (m_Splats.empty() || !io_rContext.UseProgram(m_pPointProgram))
 		return;
-	m_pStream->Fill(m_Splats);
+	m_SplatBuffer.Upload(m_Splats.data(), m_Splats.size() * sizeof(VSplat));
 	io_rContext.SetVertexFormat(CoreGraphics::VVertexFormat::PositionColour());
 	io_rContext.DrawArrays(GL_POINTS, m_Splats.size());
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "CoreGraphics/Buffers.h"
 #include "CoreGraphics/RenderState.h"
 #include "CoreGraphics/SelectableProgram.h"
 #include "CoreGraphics/Shapes.h"
@@ -47,6 +48,10 @@ public:
 	/// Draws the points since Begin.
 	void End(CoreGraphics::VRenderContext& io_rContext);
 
+	/// A place by which a rectangle finds something else that is drawn, too. Nothing unless a pick is drawn.
+	void AddPickPoint(const CoreGraphics::VRenderContext& i_rContext, const QVector3D& i_rPlace,
+	    const CoreGraphics::VSelectionId& i_rId);
+
 	/// Forgets the points of the frame.
 	void Clear() { m_PickPoints.clear(); }
 	/// Adds the ids, without flags, of points that lie in a rectangle and were not found before: a point may have lost
@@ -83,8 +88,7 @@ private:
 	CoreGraphics::VRenderState m_State;
 	CoreGraphics::VRenderState m_SelectionState;
 	std::vector<VSplat> m_Splats;
-	struct VStream;
-	std::unique_ptr<VStream> m_pStream;
+	CoreGraphics::VStreamBuffer m_SplatBuffer;
 	std::vector<VPickPoint> m_PickPoints;
 	QMatrix4x4 m_ViewProjection;
 	float m_PixelScale = 0.0f;

@@ -1,0 +1,289 @@
+#include "../CoreGraphics/OffscreenContext.h"
+
+#include "CoreGraphics/CameraController.h"
+#include "CoreGraphics/RenderContext.h"
+#include "CoreGraphics/ShaderLibrary.h"
+#include "InMemoryHost/Selection.h"
+#include "OrlexGraphics/RenderManipulator.h"
+#include "OrlexGraphics/SceneOptions.h"
+#include "OrlexGraphics/SelectionRegistry.h"
+
+#include <QColor>
+#include <QOpenGLFramebufferObject>
+
+#include <algorithm>
+#include <array>
+
+using namespace OrlexGraphics;
+
+namespace
+{
+
+constexpr int c_Width = 400;
+constexpr int c_Height = 300;
+
+using VColour = std::array<int, 3>;
+
+constexpr VColour c_Green{51, 255, 51};
+constexpr VColour c_Blue{51, 51, 255};
+constexpr VColour c_Yellow{255, 255, 0};
+
+class RenderManipulator : public GraphicsTest::InBothDialects
+{
+protected:
+	void SetUp() override
+	{
+		InBothDialects::SetUp();
+		m_Library.InitialiseGL();
+		m_Context3D.Initialise();
+		m_Context3D.ResetState();
+		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Width, c_Height, QOpenGLFramebufferObject::Depth);
+		m_Context3D.BindFramebuffer(m_pTarget.get());
+		m_pManipulator = std::make_unique<VRenderManipulator>(m_Library, m_pRegistry, m_pSelection);
+		m_pManipulator->SetVisible(true);
+		// From +X, with Y to the right and Z up, the origin in the middle of the picture.
+		m_Camera.m_Type = CoreGraphics::ECameraRight;
+		m_Camera.SetSize(QSize(c_Width, c_Height));
+	}
+
+	void DrawFrame(std::uint32_t i_Mode = CoreGraphics::ERenderNormal, std::uint32_t i_Pass = EPassOverlay)
+	{
+		m_pRegistry->SetSelection(m_pSelection->Selection().Items(), m_pSelection->PreSelection().Items());
+		m_pRegistry->Reset();
+		m_pRegistry->ClearExcluded();
+		m_pManipulator->AllocateIds();
+		m_pManipulator->Synchronise();
+		m_Camera.Update();
+		m_Camera.Apply(m_Context3D);
+		m_Context3D.m_Mode = i_Mode;
+		m_Context3D.SetClearColour(Qt::black);
+		m_Context3D.ClearBuffers(true, true);
+		m_pManipulator->Render(m_Context3D, m_Options, i_Pass);
+		m_Context3D.ReadPixels(QRect(0, 0, c_Width, c_Height), m_Pixels);
+	}
+
+	VColour Pixel(int i_X, int i_Y) const
+	{
+		const auto first = m_Pixels.begin() + 4 * (i_Y * c_Width + i_X);
+		return {first[0], first[1], first[2]};
+	}
+
+	/// Pixels from the lower left corner that hold a colour, within one step of a byte.
+	QRect Extent(const VColour& i_rColour) const
+	{
+		QRect extent;
+		for (int y = 0; y < c_Height; ++y)
+		{
+			for (int x = 0; x < c_Width; ++x)
+			{
+				const VColour pixel = Pixel(x, y);
+				if (std::equal(pixel.begin(), pixel.end(), i_rColour.begin(),
+				        [](int i_A, int i_B) { return std::abs(i_A - i_B) <= 1; }))
+					extent |= QRect(x, y, 1, 1);
+			}
+		}
+		return extent;
+	}
+
+	void PointAt(const VManipulatorHandle& i_rHandle) { m_pSelection->PreSelection().Replace({HandleItem(i_rHandle)}); }
+
+	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
+	    std::make_shared<InMemoryHost::VSelectionManager>();
+	const std::shared_ptr<VSelectionRegistry> m_pRegistry = std::make_shared<VSelectionRegistry>();
+	CoreGraphics::VShaderLibrary m_Library;
+	CoreGraphics::VRenderContext m_Context3D;
+	CoreGraphics::VCameraController m_Camera;
+	VSceneOptions m_Options;
+	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
+	std::unique_ptr<VRenderManipulator> m_pManipulator;
+	std::vector<std::uint8_t> m_Pixels;
+};
+INSTANTIATE_IN_BOTH_DIALECTS(RenderManipulator);
+
+} // namespace
+
+TEST_P(RenderManipulator, HandlesKeepTheirSizeOnTheScreen)
+{
+	struct VRow
+	{
+		const char* m_pName;
+		std::uint32_t m_Type;
+		float m_Distance;
+		float m_Scale;
+		float m_DPIRatio;
+		float m_Factor;
+	};
+	const VRow rows[] = {{"fixed", CoreGraphics::ECameraRight, 7000, 1, 1, 1},
+	    {"near", CoreGraphics::ECameraPerspective, 1000, 1, 1, 1},
+	    {"far", CoreGraphics::ECameraPerspective, 40000, 1, 1, 1},
+	    {"half", CoreGraphics::ECameraRight, 7000, 0.5f, 1, 0.5f},
+	    {"a fine display", CoreGraphics::ECameraRight, 7000, 0.5f, 2, 1}};
+	// Level with the floor, along -X as the fixed view looks.
+	m_Camera.m_Pitch = -90.0f;
+	m_Camera.m_Yaw = -90.0f;
+	m_pManipulator->SetModeMask(1);
+	for (const VRow& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		m_Camera.m_Type = rRow.m_Type;
+		m_Camera.m_Distance = rRow.m_Distance;
+		m_Options.m_ManipulatorScale = rRow.m_Scale;
+		m_pManipulator->SetDPIRatio(rRow.m_DPIRatio);
+		DrawFrame();
+		// A shaft from 10 to 90 and a head to 120 pixels.
+		const QRect green = Extent(c_Green), blue = Extent(c_Blue);
+		EXPECT_NEAR(green.right() - c_Width / 2, 120 * rRow.m_Factor, 2.5);
+		EXPECT_NEAR(green.left() - c_Width / 2, 10 * rRow.m_Factor, 2.5);
+		EXPECT_NEAR(green.height(), 20 * rRow.m_Factor, 2.5);
+		EXPECT_NEAR(blue.bottom() - c_Height / 2, 120 * rRow.m_Factor, 2.5);
+		EXPECT_NEAR(blue.width(), 20 * rRow.m_Factor, 2.5);
+	}
+}
+
+TEST_P(RenderManipulator, ModesChooseTheHandles)
+{
+	struct VRow
+	{
+		std::uint32_t m_Mask;
+		/// Of the handles of Z, seen from +X.
+		QRect m_Blue;
+	};
+	const VRow rows[] = {{0, {}}, {1, {QPoint(190, 160), QPoint(210, 270)}},
+	    // Sides at 25 pixels along X, which points at the eye, and along Y.
+	    {2, {QPoint(199, 149), QPoint(226, 151)}}, {4, {QPoint(149, 149), QPoint(251, 151)}}, {8, {}}};
+	for (const VRow& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_Mask);
+		m_pManipulator->SetModeMask(rRow.m_Mask);
+		DrawFrame();
+		const QRect blue = Extent(c_Blue);
+		EXPECT_EQ(blue.isEmpty(), rRow.m_Blue.isEmpty());
+		EXPECT_NEAR(blue.left(), rRow.m_Blue.left(), 3);
+		EXPECT_NEAR(blue.right(), rRow.m_Blue.right(), 3);
+		EXPECT_NEAR(blue.top(), rRow.m_Blue.top(), 3);
+		EXPECT_NEAR(blue.bottom(), rRow.m_Blue.bottom(), 3);
+	}
+}
+
+TEST_P(RenderManipulator, DrawsOnlyWhereItMay)
+{
+	const auto draw = [&](std::uint32_t i_Mode, std::uint32_t i_Pass)
+	{
+		DrawFrame(i_Mode, i_Pass);
+		return std::any_of(m_Pixels.begin(), m_Pixels.end(), [](int i_Byte) { return i_Byte != 0 && i_Byte != 255; })
+		    || !Extent(c_Green).isEmpty();
+	};
+	EXPECT_TRUE(draw(CoreGraphics::ERenderNormal, EPassOverlay));
+	EXPECT_TRUE(draw(CoreGraphics::ERenderPick, EPassOverlay));
+	EXPECT_FALSE(draw(CoreGraphics::ERenderId, EPassOverlay));
+	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassOpaque));
+	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassTransparent));
+	m_Options.m_bManipulator = false;
+	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassOverlay));
+	m_Options.m_bManipulator = true;
+	m_Options.m_OverlayCamera = "camera";
+	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassOverlay));
+	m_Options.m_OverlayCamera.clear();
+	m_pManipulator->SetVisible(false);
+	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassOverlay));
+}
+
+TEST_P(RenderManipulator, PicksGiveTheHandle)
+{
+	const auto itemAt = [&](int i_X, int i_Y)
+	{
+		const VColour pixel = Pixel(i_X, i_Y);
+		NVX::ISelectionItem item;
+		m_pRegistry->ResolveId(static_cast<std::uint32_t>(pixel[0] | pixel[1] << 8 | pixel[2] << 16), item);
+		return item;
+	};
+	DrawFrame(CoreGraphics::ERenderPick);
+	EXPECT_EQ(itemAt(300, 150), HandleItem({EManipulatorArrow, 1}));
+	EXPECT_EQ(itemAt(200, 250), HandleItem({EManipulatorArrow, 2}));
+	// The ring about X stands upright before the eye.
+	const float diagonal = 50.0f * 0.70710678f;
+	EXPECT_EQ(itemAt(200 - qRound(diagonal), 150 - qRound(diagonal)), HandleItem({EManipulatorRing, 0}));
+	EXPECT_EQ(itemAt(100, 250), NVX::ISelectionItem());
+
+	// What was found is left out of the next layer.
+	m_pRegistry->Exclude(m_pRegistry->Allocate(HandleItem({EManipulatorArrow, 1})));
+	m_Context3D.ClearBuffers(true, true);
+	m_pManipulator->Render(m_Context3D, m_Options, EPassOverlay);
+	m_Context3D.ReadPixels(QRect(0, 0, c_Width, c_Height), m_Pixels);
+	EXPECT_EQ(itemAt(300, 150), NVX::ISelectionItem());
+}
+
+TEST_P(RenderManipulator, APressDragsTheHandleThatIsPointedAt)
+{
+	int begun = 0, ended = 0;
+	std::vector<QMatrix4x4> changes;
+	m_pManipulator->BeginSignal().Connect([&] { ++begun; });
+	m_pManipulator->ChangedSignal().Connect([&](const QMatrix4x4& i_rMatrix) { changes.push_back(i_rMatrix); });
+	m_pManipulator->EndSignal().Connect([&] { ++ended; });
+	const NVX::ISelectionItem segment{NVX::ESelectionTargetSegment, 0x0fffffff, 4, "arm"};
+	m_pSelection->Selection().Replace({segment});
+	m_Camera.Update();
+
+	EXPECT_FALSE(m_pManipulator->IsHovered());
+	m_pManipulator->Press(m_Camera, {300, 150});
+	EXPECT_FALSE(m_pManipulator->IsDragging());
+
+	PointAt({EManipulatorArrow, 1});
+	EXPECT_TRUE(m_pManipulator->IsHovered());
+	DrawFrame();
+	EXPECT_EQ(Pixel(300, 150), c_Yellow);
+
+	m_pManipulator->Press(m_Camera, {300, 150});
+	EXPECT_TRUE(m_pManipulator->IsDragging());
+	EXPECT_EQ(begun, 1);
+	// The segment stays selected beside the handle.
+	EXPECT_EQ(m_pSelection->Selection().Items(),
+	    (std::vector<NVX::ISelectionItem>{segment, HandleItem({EManipulatorArrow, 1})}));
+	m_pSelection->PreSelection().Replace({});
+	m_pManipulator->Drag(m_Camera, {310, 140}, {});
+	ASSERT_EQ(changes.size(), 1u);
+	// 4 mm a pixel.
+	EXPECT_NEAR(changes[0](1, 3), 40.0f, 0.02f);
+	EXPECT_NEAR(changes[0](2, 3), 0.0f, 0.02f);
+	EXPECT_EQ(m_pManipulator->Transform(), changes[0]);
+	EXPECT_TRUE(m_pManipulator->GivenTransform().isIdentity());
+
+	// While it is dragged it takes no other transform.
+	QMatrix4x4 other;
+	other.translate(1, 2, 3);
+	m_pManipulator->SetTransform(other);
+	EXPECT_EQ(m_pManipulator->Transform(), changes[0]);
+	DrawFrame();
+	EXPECT_EQ(Pixel(310, 150), c_Yellow);
+	// The black marker stands on the other side, over the ring about X.
+	m_pManipulator->SetModeMask(4);
+	DrawFrame();
+	EXPECT_EQ(Pixel(210 - 45, 150), (VColour{0, 0, 0}));
+
+	m_pManipulator->Release();
+	EXPECT_FALSE(m_pManipulator->IsDragging());
+	EXPECT_EQ(ended, 1);
+	EXPECT_EQ(m_pSelection->Selection().Items(), std::vector<NVX::ISelectionItem>{segment});
+	m_pManipulator->Drag(m_Camera, {350, 140}, {});
+	m_pManipulator->Release();
+	EXPECT_EQ(changes.size(), 1u);
+	EXPECT_EQ(ended, 1);
+	m_pManipulator->SetTransform(other);
+	EXPECT_EQ(m_pManipulator->Transform(), other);
+
+	// A refused press begins nothing: the arrow of X points at the eye.
+	PointAt({EManipulatorArrow, 0});
+	m_pManipulator->Press(m_Camera, {200, 150});
+	EXPECT_FALSE(m_pManipulator->IsDragging());
+	EXPECT_EQ(begun, 1);
+
+	// Hidden it takes no press, and hiding it ends a drag.
+	PointAt({EManipulatorRing, 0});
+	m_pManipulator->Press(m_Camera, {250, 150});
+	EXPECT_TRUE(m_pManipulator->IsDragging());
+	m_pManipulator->SetVisible(false);
+	EXPECT_FALSE(m_pManipulator->IsDragging());
+	EXPECT_FALSE(m_pManipulator->IsHovered());
+	EXPECT_EQ(ended, 2);
+	EXPECT_EQ(m_pSelection->Selection().Items(), std::vector<NVX::ISelectionItem>{segment});
+}
