@@ -71,6 +71,8 @@ FocusScope {
 		boundsBehavior: Flickable.StopAtBounds
 		highlightMoveDuration: 1
 		highlightMoveVelocity: -1
+		// The keys select, too.
+		keyNavigationEnabled: false
 		// The wheel and the bar scroll; a drag with the mouse is left alone.
 		interactive: contentHeight > height
 

@@ -1,0 +1,241 @@
+// The whole job at the window, by mouse and keyboard alone: from two files to a saved retarget subject.
+
+#include "Operator.h"
+
+#include "CoreOrlexQRTIO/Reader.h"
+#include "CoreOrlexTypes/TextForm.h"
+#include "studio/Preferences.h"
+#include "studio/RetargetPanel.h"
+#include "studio/Services.h"
+#include "studio/StudioWindow.h"
+
+#include <gtest/gtest.h>
+
+#include <QApplication>
+#include <QFile>
+#include <QProcess>
+#include <QQuickWidget>
+#include <QTemporaryDir>
+#include <QTest>
+
+namespace
+{
+
+class Window : public testing::Test
+{
+protected:
+	static void SetUpTestSuite()
+	{
+		static int s_Count = 1;
+		static char s_Name[] = "test";
+		static char* s_pArguments[] = {s_Name, nullptr};
+		s_pApplication = new QApplication(s_Count, s_pArguments);
+	}
+	static void TearDownTestSuite() { delete s_pApplication; }
+
+	void SetUp() override
+	{
+		const std::string folder = m_Folder.path().toStdString();
+		QFile::copy(RETARGET_SOURCE "/demo/performer.qrs", m_Folder.filePath("performer.qrs"));
+		QFile::copy(RETARGET_SOURCE "/demo/character.fbx", m_Folder.filePath("character.fbx"));
+		m_pSettings = std::make_unique<QSettings>(m_Folder.filePath("studio.ini"), QSettings::IniFormat);
+		m_pWindow = std::make_unique<StudioHost::VStudioWindow>(*m_pSettings);
+		for (const char* const pKey : {"FolderSubjects", "FolderSkins", "FolderRetargets"})
+			m_pWindow->Context().Preferences().SetFolder(pKey, folder);
+		ASSERT_TRUE(m_pWindow->LoadModule(RETARGET_MODULE));
+		m_pWindow->resize(1280, 800);
+		m_pWindow->show();
+		m_pWindow->activateWindow();
+		ASSERT_TRUE(QTest::qWaitForWindowActive(m_pWindow.get()));
+		auto* const pPanel = qobject_cast<QQuickWidget*>(m_pWindow->RetargetPanel()->Widget());
+		ASSERT_TRUE(pPanel && pPanel->rootObject());
+		m_pOperator = std::make_unique<VOperator>(*m_pWindow, *pPanel);
+	}
+
+	QString File(const char* i_pName) const { return m_Folder.filePath(i_pName); }
+
+	QByteArray Content(const char* i_pName) const
+	{
+		QFile file(File(i_pName));
+		EXPECT_TRUE(file.open(QIODevice::ReadOnly)) << i_pName;
+		return file.readAll();
+	}
+
+	/// What the command line writes for the same edits.
+	QByteArray CommandLine(const QStringList& i_rArguments)
+	{
+		QProcess process;
+		process.start(RETARGET_PROGRAM, QStringList{"-q"} + i_rArguments + QStringList{"-o", File("expected.qrr")});
+		EXPECT_TRUE(process.waitForFinished(60000));
+		EXPECT_EQ(process.exitCode(), 0) << process.readAllStandardError().toStdString();
+		return Content("expected.qrr");
+	}
+
+	/// A subject of one target as programs of old wrote it.
+	QByteArray LegacyFile()
+	{
+		const QByteArray made = CommandLine({"create", "--fbx", File("character.fbx"), "--source",
+		    File("performer.qrs"), "--rotation", "Pelvis:haunch"});
+		CoreOrlexTypes::VSubjectRecord record;
+		CoreOrlexQRTIO::VSubjectQRTExtras extras;
+		std::vector<std::string> errors;
+		std::vector<std::string> warnings;
+		EXPECT_TRUE(CoreOrlexQRTIO::VReader().ReadText(made.toStdString(), "Template", 0x0FFFFFFFu,
+		    record.m_SubjectParametrised, record.m_SubjectApplicationData, extras, errors, warnings));
+		std::string text;
+		EXPECT_TRUE(CoreOrlexTypes::WriteText(record, text));
+		return "[[1,0,1],\"\"]" + QByteArray::fromStdString(text);
+	}
+
+	int RowOf(const char* i_pList, const char* i_pName) const
+	{
+		QObject* const pModel = m_pOperator->Property(i_pList, "model").value<QObject*>();
+		const auto* const pItems = qobject_cast<QAbstractItemModel*>(pModel);
+		for (int row = 0; pItems && row < pItems->rowCount(); ++row)
+			if (pItems->data(pItems->index(row, 0), Qt::UserRole + 1).toString() == i_pName)
+				return row;
+		ADD_FAILURE() << i_pName;
+		return 0;
+	}
+	void SelectPair(const char* i_pSource, const char* i_pTarget)
+	{
+		m_pOperator->ClickRow("sourceSegments", RowOf("sourceSegments", i_pSource));
+		m_pOperator->ClickRow("targetSegments", RowOf("targetSegments", i_pTarget));
+		EXPECT_EVENTUALLY(m_pOperator->Property("addPositionTarget", "enabled").toBool());
+	}
+	int Targets() const { return m_pOperator->Property("targets", "count").toInt(); }
+
+	static QApplication* s_pApplication;
+	QTemporaryDir m_Folder;
+	std::unique_ptr<QSettings> m_pSettings;
+	std::unique_ptr<StudioHost::VStudioWindow> m_pWindow;
+	std::unique_ptr<VOperator> m_pOperator;
+};
+
+QApplication* Window::s_pApplication = nullptr;
+
+TEST_F(Window, TheWholeJob)
+{
+	VOperator& rOperator = *m_pOperator;
+	rOperator.Choose("SourceSkeleton", "performer");
+	EXPECT_EVENTUALLY(rOperator.Property("sourceSegments", "count").toInt() > 20);
+	rOperator.Choose("TargetFBX", "character");
+	EXPECT_EVENTUALLY(rOperator.Property("TargetRoot", "currentText").toString() == "haunch");
+	rOperator.Choose("TargetRoot", "loin");
+	rOperator.Choose("TargetRoot", "haunch");
+	rOperator.Fill("TargetScale", "1.25");
+	rOperator.Click("createTargetSubject");
+	EXPECT_EVENTUALLY(rOperator.Property("targetSegments", "count").toInt() > 20);
+	QStringList edits{"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--scale", "1.25"};
+
+	SelectPair("Pelvis", "haunch");
+	rOperator.Click("addPositionTarget");
+	EXPECT_EVENTUALLY(Targets() == 1);
+	rOperator.Key(Qt::Key_R, Qt::AltModifier);
+	EXPECT_EVENTUALLY(Targets() == 2);
+	edits += {"--position", "Pelvis:haunch", "--rotation", "Pelvis:haunch"};
+
+	rOperator.Click("targetSymmetry");
+	SelectPair("L_Hand", "palmLeft");
+	rOperator.Key(Qt::Key_T, Qt::AltModifier);
+	EXPECT_EVENTUALLY(Targets() == 4);
+	SelectPair("L_Humerus", "upperArmLeft");
+	rOperator.Click("addRotationTarget");
+	EXPECT_EVENTUALLY(Targets() == 6);
+	rOperator.Click("targetSymmetry");
+	SelectPair("Cranium", "skull");
+	rOperator.Click("addPositionTarget");
+	EXPECT_EVENTUALLY(Targets() == 7);
+	edits += {"--symmetry", "--position", "L_Hand:palmLeft", "--rotation", "L_Humerus:upperArmLeft", "--no-symmetry",
+	    "--position", "Cranium:skull"};
+
+	rOperator.Click("removeUnnecessaryJoints");
+	rOperator.Click("updateTargets");
+	edits += {"--prune-joints", "--update-targets"};
+
+	rOperator.ClickRow("targets", 6);
+	EXPECT_EVENTUALLY(rOperator.Property("removeTarget", "enabled").toBool());
+	rOperator.Fill("TargetWeight", "2.5");
+	rOperator.Fill("TargetStateExpressionX", "12.5");
+	rOperator.Fill("TargetStateExpressionY", "-3");
+	rOperator.Fill("TargetStateExpressionZ", "0");
+	edits += {"--weight", "6=2.5", "--state", "6=12.5,-3,0"};
+	rOperator.ClickRow("targets", 1);
+	EXPECT_EVENTUALLY(!rOperator.Property("TargetWeight", "text").toString().startsWith("2.5"));
+	rOperator.Click("removeTarget");
+	EXPECT_EVENTUALLY(Targets() == 6);
+	rOperator.Click("createAllJoints");
+	edits += {"--remove-target", "1", "--create-joints"};
+
+	EXPECT_FALSE(rOperator.Property("save", "enabled").toBool());
+	rOperator.Click("saveAs");
+	rOperator.AnswerDialog(File("job.qrr"));
+	EXPECT_EVENTUALLY(QFile::exists(File("job.qrr")));
+	EXPECT_EVENTUALLY(rOperator.Property("currentFile", "text").toString() == "Current file: job.qrr");
+	EXPECT_TRUE(Content("job.qrr") == CommandLine(edits));
+
+	rOperator.ClickRow("targets", 0);
+	EXPECT_EVENTUALLY(rOperator.Property("removeTarget", "enabled").toBool());
+	rOperator.Fill("TargetWeight", "7");
+	rOperator.Click("save");
+	edits += {"--weight", "0=7"};
+	const QByteArray saved = CommandLine(edits);
+	EXPECT_EVENTUALLY(Content("job.qrr") == saved);
+
+	rOperator.Click("removeTarget");
+	EXPECT_EVENTUALLY(Targets() == 5);
+	rOperator.Click("load");
+	rOperator.AnswerDialog(File("job.qrr"));
+	EXPECT_EVENTUALLY(Targets() == 6);
+	rOperator.Click("save");
+	EXPECT_TRUE(Content("job.qrr") == saved);
+}
+
+TEST_F(Window, SelectsWithMouseAndKeys)
+{
+	VOperator& rOperator = *m_pOperator;
+	rOperator.Choose("SourceSkeleton", "performer");
+	EXPECT_EVENTUALLY(rOperator.Property("sourceSegments", "count").toInt() > 20);
+	const int last = rOperator.Property("sourceSegments", "count").toInt() - 1;
+	const auto selected = [&] { return rOperator.Property("sourceSegments", "selectedIndex").toInt(); };
+
+	rOperator.ClickRow("sourceSegments", 3);
+	EXPECT_EVENTUALLY(selected() == 3);
+	rOperator.ClickRow("sourceSegments", 5, Qt::ControlModifier);
+	EXPECT_EVENTUALLY(selected() == -1) << "two are selected";
+	rOperator.ClickRow("sourceSegments", 3, Qt::ControlModifier);
+	EXPECT_EVENTUALLY(selected() == 5);
+	const std::pair<Qt::Key, int> keys[] = {{Qt::Key_Down, 6}, {Qt::Key_Up, 5}, {Qt::Key_End, last},
+	    {Qt::Key_Down, last}, {Qt::Key_Home, 0}, {Qt::Key_Up, 0}};
+	for (const auto& [key, expected] : keys)
+	{
+		rOperator.Key(key);
+		EXPECT_EVENTUALLY(selected() == expected) << key;
+	}
+	auto& rPreSelection = m_pWindow->Context().GetSelectionManager()->PreSelection();
+	rOperator.Hover("sourceSegmentsRow2");
+	EXPECT_EVENTUALLY(rPreSelection.Items().size() == 1 && rPreSelection.Items()[0].m_ElementIndex == 2);
+	EXPECT_EQ(selected(), 0) << "pointing at a row selects nothing";
+	rOperator.Hover("updateTargets");
+	EXPECT_EVENTUALLY(rPreSelection.Items().empty());
+}
+
+TEST_F(Window, ALegacyFileIsSavedUnderANewName)
+{
+	VOperator& rOperator = *m_pOperator;
+	const QByteArray legacy = LegacyFile();
+	QFile file(File("old.qrx"));
+	ASSERT_TRUE(file.open(QIODevice::WriteOnly) && file.write(legacy) == legacy.size());
+	file.close();
+	rOperator.Click("load");
+	rOperator.AnswerDialog(File("old.qrx"));
+	EXPECT_EVENTUALLY(rOperator.Property("currentFile", "text").toString() == "Current file: old.qrx");
+	rOperator.Click("save");
+	rOperator.AnswerDialog(File("new.qrr"));
+	EXPECT_EVENTUALLY(QFile::exists(File("new.qrr")));
+	EXPECT_TRUE(Content("new.qrr") == CommandLine({"edit", File("old.qrx")}));
+	EXPECT_TRUE(Content("old.qrx") == legacy);
+	EXPECT_EVENTUALLY(rOperator.Property("currentFile", "text").toString() == "Current file: new.qrr");
+}
+
+} // namespace

@@ -1,0 +1,59 @@
+#pragma once
+
+#include <QString>
+#include <QStringList>
+#include <QVariant>
+
+#include <functional>
+
+class QQuickItem;
+class QQuickWidget;
+class QWidget;
+
+/// Someone at the window, with a mouse and a keyboard: every event goes the way of the real ones, from the window on.
+class VOperator
+{
+public:
+	/// @param i_rWindow is shown and active.
+	/// @param i_rPanel stands in it.
+	VOperator(QWidget& i_rWindow, QQuickWidget& i_rPanel);
+
+	/// Of the panel, by objectName, visible ones first; null with a test failure if there is none.
+	QQuickItem* Item(const QString& i_rName) const;
+	QVariant Property(const QString& i_rName, const char* i_pProperty) const;
+
+	/// The mouse, in the middle of an item.
+	void Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+	void Hover(const QString& i_rName);
+
+	/// The keyboard, where the focus is.
+	void Key(int i_Key, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+	void Type(const QString& i_rText);
+
+	/// Clicks a field, and puts a text in the place of what is there.
+	void Fill(const QString& i_rName, const QString& i_rText);
+	/// Opens a box and picks the entry with this text.
+	void Choose(const QString& i_rName, const QString& i_rEntry);
+	/// Clicks on a row of a list or table by its number, after scrolling to it.
+	void ClickRow(const QString& i_rList, int i_Row, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+
+	/// In the file dialog that is open, or opens soon: types the path and presses Enter. A test failure if there is
+	/// none.
+	void AnswerDialog(const QString& i_rPath);
+	/// Waits for a file dialog and closes it.
+	/// @return false if none comes.
+	bool DismissDialog();
+
+private:
+	QWidget* Dialog() const;
+	/// The dialog has closed, and the keyboard is the window's again.
+	bool ComeBack();
+
+	QWidget& m_rWindow;
+	QQuickWidget& m_rPanel;
+};
+
+/// Runs events until the condition holds; false after some seconds.
+bool Eventually(const std::function<bool()>& i_rCondition);
+
+#define EXPECT_EVENTUALLY(condition) EXPECT_TRUE(Eventually([&] { return bool(condition); })) << #condition
