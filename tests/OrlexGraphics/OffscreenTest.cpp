@@ -1,0 +1,267 @@
+#include "CoreGraphics/RenderContext.h"
+#include "CoreGraphics/SelectionId.h"
+#include "OffscreenContext.h"
+#include "OrlexGraphics/FrameRenderer.h"
+#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/SphereHelper.h"
+#include "ViewFixture.h"
+
+#include <QImage>
+#include <QOpenGLFramebufferObject>
+
+#include <cmath>
+#include <cstdlib>
+#include <new>
+#include <thread>
+
+namespace
+{
+
+thread_local std::size_t g_Allocations = 0;
+
+void* Allocate(std::size_t i_Size)
+{
+	++g_Allocations;
+	if (void* pMemory = std::malloc(i_Size ? i_Size : 1))
+		return pMemory;
+	throw std::bad_alloc();
+}
+
+} // namespace
+
+void* operator new(std::size_t i_Size)
+{
+	return Allocate(i_Size);
+}
+void* operator new[](std::size_t i_Size)
+{
+	return Allocate(i_Size);
+}
+void operator delete(void* i_pMemory) noexcept
+{
+	std::free(i_pMemory);
+}
+void operator delete[](void* i_pMemory) noexcept
+{
+	std::free(i_pMemory);
+}
+void operator delete(void* i_pMemory, std::size_t) noexcept
+{
+	std::free(i_pMemory);
+}
+void operator delete[](void* i_pMemory, std::size_t) noexcept
+{
+	std::free(i_pMemory);
+}
+
+namespace
+{
+
+using OrlexGraphics::VFrameRenderer;
+using OrlexGraphics::VPick;
+using OrlexGraphics::VPickRequest;
+
+/// Spheres, all of one radius in pixels, beside the boxes.
+class VSpheres : public OrlexGraphics::IRenderType
+{
+public:
+	VSpheres(std::shared_ptr<OrlexGraphics::VSphereHelper> i_pHelper) : m_pHelper(std::move(i_pHelper)) {}
+
+	void Render(CoreGraphics::VRenderContext& io_rContext, const OrlexGraphics::VSceneOptions& /*i_rOptions*/,
+	    std::uint32_t i_Pass) override
+	{
+		if (i_Pass != OrlexGraphics::EPassOpaque)
+			return;
+		m_pHelper->Begin(io_rContext);
+		for (std::size_t i = 0; i < m_Spheres.size(); ++i)
+			m_pHelper->Draw(io_rContext, m_Spheres[i], m_Ids[i], {1, 1, 1, 1}, 3);
+		m_pHelper->End(io_rContext);
+	}
+
+	const std::shared_ptr<OrlexGraphics::VSphereHelper> m_pHelper;
+	std::vector<QVector4D> m_Spheres;
+	std::vector<CoreGraphics::VSelectionId> m_Ids;
+};
+
+class VSphereScene : public VBoxScene
+{
+public:
+	using VBoxScene::VBoxScene;
+
+	void InitialiseGL() override
+	{
+		VBoxScene::InitialiseGL();
+		if (m_pSpheres)
+			return;
+		m_pSpheres = std::make_shared<VSpheres>(m_pSphereHelper);
+		m_RenderList.push_back(m_pSpheres);
+	}
+
+	void Refresh() override
+	{
+		VBoxScene::Refresh();
+		CoreGraphics::VCameraController front;
+		front.m_Type = CoreGraphics::ECameraFront;
+		const QMatrix4x4 toWorld = front.Orientation().inverted();
+		m_pSpheres->m_Spheres.clear();
+		m_pSpheres->m_Ids.clear();
+		for (std::size_t i = 0; i < m_Radii.size(); ++i)
+		{
+			// A row of pixels apart, 4 mm each.
+			const QVector3D eye(4.0f * (20.0f * static_cast<float>(i) + 20.5f - 100.0f), 4.0f * (80.0f - 120.5f), 0.0f);
+			m_pSpheres->m_Spheres.emplace_back(toWorld.map(eye), 4.0f * m_Radii[i]);
+			m_pSpheres->m_Ids.push_back(m_pRegistry->GetId(Item(100 + static_cast<std::uint32_t>(i))));
+		}
+	}
+
+	/// Pixels.
+	std::vector<float> m_Radii;
+	std::shared_ptr<VSpheres> m_pSpheres;
+};
+
+class Offscreen : public GraphicsTest::InBothDialects
+{
+protected:
+	void SetUp() override
+	{
+		ASSERT_NO_FATAL_FAILURE(InBothDialects::SetUp());
+		m_pScene = std::make_shared<VSphereScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false);
+		m_pScene->m_Size = m_Size;
+		m_Renderer.Initialise();
+		m_Renderer.m_Input.m_Camera.m_Type = CoreGraphics::ECameraFront;
+		m_Renderer.m_Input.m_Camera.SetSize(m_Size);
+		m_Renderer.SetScene(m_pScene);
+		m_Renderer.SetSize(m_Size);
+		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(m_Size, m_Renderer.TargetFormat());
+	}
+
+	void Frame()
+	{
+		m_pScene->SetNeedsRefresh();
+		m_pScene->Synchronise();
+		m_Renderer.Update();
+		m_Renderer.Render(*m_pTarget);
+	}
+
+	std::vector<std::uint32_t> Pick(const QPoint& i_rMouse, std::optional<QPoint> i_Start = {})
+	{
+		VPickRequest request;
+		request.m_Mouse = i_rMouse;
+		request.m_bRectangle = i_Start.has_value();
+		request.m_Start = i_Start.value_or(QPoint());
+		VPick pick;
+		m_Renderer.Pick(request, pick);
+		std::vector<std::uint32_t> indices;
+		for (const NVX::ISelectionItem& rItem : pick.m_Items)
+			indices.push_back(rItem.m_ElementIndex);
+		return indices;
+	}
+
+	const QSize m_Size{200, 160};
+	const std::shared_ptr<VEventLoopDispatcher> m_pDispatcher = std::make_shared<VEventLoopDispatcher>();
+	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
+	    std::make_shared<InMemoryHost::VSelectionManager>();
+	const std::shared_ptr<CoreGraphics::VShaderLibrary> m_pShaders = std::make_shared<CoreGraphics::VShaderLibrary>();
+	std::shared_ptr<VSphereScene> m_pScene;
+	VFrameRenderer m_Renderer;
+	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
+};
+
+INSTANTIATE_IN_BOTH_DIALECTS(Offscreen);
+
+TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
+{
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
+	m_pSelection->Selection().Replace({Item(1)});
+	Frame();
+	const QImage image = m_pTarget->toImage();
+	EXPECT_EQ(image.pixel(40, 40), 0xff4040ffu);
+	EXPECT_EQ(image.pixel(120, 40), 0xff0000ffu);
+	EXPECT_EQ(image.pixel(190, 150), 0xff202020u);
+	EXPECT_EQ(Pick({120, 40}), std::vector<std::uint32_t>{2});
+	EXPECT_EQ(Pick({80, 120}), std::vector<std::uint32_t>{});
+	EXPECT_EQ(Pick({10, 10}, QPoint(150, 100)), (std::vector<std::uint32_t>{1, 2}));
+}
+
+TEST_P(Offscreen, DrawsSpheresByTheirSizeOnScreen)
+{
+	m_pScene->m_Radii = {0.0f, 0.5f, 1.3f, 3.0f, 9.0f};
+	Frame();
+	const QImage image = m_pTarget->toImage();
+	const auto lit = [&](int i_Index)
+	{
+		int pixels = 0;
+		for (int y = 110; y < 131; ++y)
+			for (int x = 10; x < 31; ++x)
+				pixels += qRed(image.pixel(20 * i_Index + x, y)) > 0x30 ? 1 : 0;
+		return pixels;
+	};
+	EXPECT_EQ(lit(0), 0) << "nothing";
+	EXPECT_GE(lit(1), 1) << "a point";
+	EXPECT_LE(lit(1), 16);
+	EXPECT_EQ(lit(1), lit(2)) << "a point";
+	EXPECT_GT(lit(3), lit(2)) << "a mesh";
+	EXPECT_NEAR(lit(4), 254, 40) << "the disc";
+
+	for (std::uint32_t i = 1; i < 5; ++i)
+		EXPECT_EQ(Pick({20 + 20 * static_cast<int>(i), 120}), std::vector<std::uint32_t>{100 + i}) << i;
+	EXPECT_EQ(Pick({0, 100}, QPoint(199, 140)).size(), 5u);
+	EXPECT_EQ(Pick({50, 100}, QPoint(70, 140)), std::vector<std::uint32_t>{102});
+}
+
+TEST(SphereHelper, ChoosesTheMeshByTheEdgesOnScreen)
+{
+	// Chords of a circle of radius 1 cut in 4, 8, 16, 32: an edge is to be 2 pixels long.
+	const double chords[] = {std::sqrt(2.0), 0.7653668647, 0.3901806440, 0.1960342807};
+	for (int level = 0; level < 4; ++level)
+	{
+		const double radius = 2.0 / chords[level];
+		EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(static_cast<float>(radius * 0.999), 3), level - 1);
+		EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(static_cast<float>(radius * 1.001), 3), level);
+	}
+	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(1e6f, 1), 1);
+	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(1e6f, 9), 3);
+	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(-1.0f, 3), -1);
+}
+
+TEST_P(Offscreen, AllocatesNothingInAFrameThatDoesNotChange)
+{
+	for (std::uint32_t i = 0; i < 40; ++i)
+		m_pScene->m_Next.m_Boxes.push_back({Item(i), QRectF(4 * i, 20, 3, 3)});
+	m_pScene->m_Radii = {0.5f, 1.0f, 3.0f, 9.0f};
+	m_pSelection->Selection().Replace({Item(1), Item(2)});
+	for (int i = 0; i < 3; ++i)
+		Frame();
+	const std::size_t before = g_Allocations;
+	m_Renderer.Render(*m_pTarget);
+	const std::size_t first = g_Allocations - before;
+	EXPECT_EQ(first, 0u);
+}
+
+TEST_P(Offscreen, GoesOnInAContextThatSharesNothing)
+{
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}};
+	m_pScene->m_Radii = {1.0f, 9.0f};
+	m_pSelection->Selection().Replace({Item(1)});
+	Frame();
+	const QImage before = m_pTarget->toImage();
+	GraphicsTest::VOffscreenContext other(GetParam());
+	ASSERT_TRUE(other.IsValid());
+	other.MakeCurrent();
+	{
+		VFrameRenderer renderer;
+		renderer.Initialise();
+		renderer.m_Input.m_Camera = m_Renderer.m_Input.m_Camera;
+		renderer.SetScene(m_pScene);
+		renderer.SetSize(m_Size);
+		QOpenGLFramebufferObject target(m_Size, renderer.TargetFormat());
+		m_pScene->Synchronise();
+		renderer.Update();
+		renderer.Render(target);
+		EXPECT_EQ(target.toImage(), before);
+		EXPECT_EQ(other.GL().glGetError(), static_cast<GLenum>(GL_NO_ERROR));
+	}
+	m_Context.MakeCurrent();
+}
+
+} // namespace
