@@ -1,6 +1,6 @@
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/SelectionId.h"
-#include "OffscreenContext.h"
+#include "../CoreGraphics/OffscreenContext.h"
 #include "OrlexGraphics/FrameRenderer.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SphereHelper.h"

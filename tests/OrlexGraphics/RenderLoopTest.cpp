@@ -14,9 +14,11 @@ TEST(RenderLoops, ShowAndPickTheSame)
 	{
 		const char* m_pName;
 		std::vector<std::pair<const char*, const char*>> m_Variables;
+		const char* m_pTests = c_pTests;
 	} rows[] = {
 	    {"window, drawn on this thread", {{"RETARGET_TEST_VIEW", "1"}, {"QSG_RENDER_LOOP", "basic"}}},
 	    {"window, drawn on another thread", {{"RETARGET_TEST_VIEW", "1"}, {"QSG_RENDER_LOOP", "threaded"}}},
+	    {"no OpenGL", {{"QT_QUICK_BACKEND", "software"}}, "VViewTest.DISABLED_Says*"},
 	    {"display of double resolution", {{"QT_SCALE_FACTOR", "2"}}},
 	};
 	for (const auto& rRow : rows)
@@ -27,7 +29,8 @@ TEST(RenderLoops, ShowAndPickTheSame)
 			environment.insert(pName, pValue);
 		process.setProcessEnvironment(environment);
 		process.setProcessChannelMode(QProcess::MergedChannels);
-		process.start(QCoreApplication::applicationFilePath(), {QString("--gtest_filter=") + c_pTests});
+		process.start(QCoreApplication::applicationFilePath(),
+		    {QString("--gtest_filter=") + rRow.m_pTests, "--gtest_also_run_disabled_tests"});
 		ASSERT_TRUE(process.waitForFinished(300000)) << rRow.m_pName;
 		EXPECT_EQ(process.exitCode(), 0) << rRow.m_pName << "\n" << process.readAll().toStdString();
 		EXPECT_EQ(process.exitStatus(), QProcess::NormalExit) << rRow.m_pName;

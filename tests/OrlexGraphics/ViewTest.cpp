@@ -190,6 +190,27 @@ TEST_F(VViewTest, PlacesLabelsOverTheView)
 	EXPECT_EQ(subjects.count(), 2);
 }
 
+/// In a process without OpenGL, see RenderLoopTest.
+TEST_F(VViewTest, DISABLED_SaysThatThereIsNoOpenGL)
+{
+	Show(std::make_shared<OrlexGraphics::VOrlexScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false));
+	const auto textPixels = [&]
+	{
+		const QImage image = Grab();
+		int pixels = 0;
+		for (int y = 0; y < image.height(); ++y)
+			for (int x = 0; x < image.width(); ++x)
+				pixels += image.pixel(x, y) != c_Background ? 1 : 0;
+		return pixels;
+	};
+	EXPECT_TRUE(Until([&] { return textPixels() > 200 && textPixels() < 20000; })) << textPixels();
+	EXPECT_EQ(OrlexGraphics::VSceneFramebufferRenderer::MadeCount(), 0u);
+	Resize(300, 100);
+	EXPECT_TRUE(Until([&] { return Grab().width() == 300 && textPixels() > 200 && textPixels() < 20000; }));
+	Click({50, 50});
+	Close();
+}
+
 TEST_F(VViewTest, EndsItsRenderersWithTheirWindows)
 {
 	using OrlexGraphics::VSceneFramebufferRenderer;

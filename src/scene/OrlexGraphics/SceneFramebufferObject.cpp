@@ -4,6 +4,7 @@
 #include "DebugServices/Assert.h"
 #include "OrlexGraphics/CameraGrid.h"
 #include "OrlexGraphics/IManipulator.h"
+#include "OrlexGraphics/NoOpenGLNode.h"
 #include "OrlexGraphics/OrlexScene.h"
 #include "OrlexGraphics/OverlayObjects.h"
 #include "OrlexGraphics/OverlayPlacement.h"
@@ -168,6 +169,12 @@ void VSceneFramebufferObject::ScaleManipulator(double i_Factor)
 QQuickFramebufferObject::Renderer* VSceneFramebufferObject::createRenderer() const
 {
 	return new VSceneFramebufferRenderer;
+}
+
+QSGNode* VSceneFramebufferObject::updatePaintNode(QSGNode* io_pNode, UpdatePaintNodeData* io_pData)
+{
+	return HasOpenGL(*window()) ? QQuickFramebufferObject::updatePaintNode(io_pNode, io_pData)
+	                            : UpdateNoOpenGLNode(io_pNode, *window(), size());
 }
 
 void VSceneFramebufferObject::OnFocusChanged()

@@ -119,6 +119,7 @@ public slots:
 	void OnSceneOptionsMapChanged(const QString& i_rKey, const QVariant& i_rValue);
 
 protected:
+	QSGNode* updatePaintNode(QSGNode* io_pNode, UpdatePaintNodeData* io_pData) override;
 	void mousePressEvent(QMouseEvent* io_pEvent) override;
 	void mouseMoveEvent(QMouseEvent* io_pEvent) override;
 	void mouseReleaseEvent(QMouseEvent* io_pEvent) override;
