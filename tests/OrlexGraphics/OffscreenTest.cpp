@@ -1,6 +1,6 @@
+#include "../CoreGraphics/OffscreenContext.h"
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/SelectionId.h"
-#include "../CoreGraphics/OffscreenContext.h"
 #include "OrlexGraphics/FrameRenderer.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SphereHelper.h"
