@@ -9,13 +9,16 @@ T.ToolTip {
 	readonly property real widest: 360
 
 	x: parent ? Math.round((parent.width - implicitWidth) / 2) : 0
-	y: -implicitHeight - 4
+	// Above its owner, or below where it would cover it.
+	y: parent && parent.mapToItem(null, 0, 0).y < implicitHeight + 8 ? parent.height + 4 : -implicitHeight - 4
 	implicitWidth: Math.min(widest, Math.ceil(contentItem.implicitWidth)) + leftPadding + rightPadding
 	implicitHeight: contentItem.implicitHeight + topPadding + bottomPadding
 	margins: 4
 	padding: 5
 	leftPadding: 7
 	rightPadding: 7
+	// Never takes a press from what it covers.
+	enabled: false
 	delay: Theme.infoToolTipDelay
 	closePolicy: T.Popup.CloseOnEscape | T.Popup.CloseOnPressOutsideParent | T.Popup.CloseOnReleaseOutsideParent
 
