@@ -40,6 +40,8 @@ void VPanelManager::AddPanel(const std::string& i_rTitle, std::int32_t i_Order, 
 	const QList<QDockWidget*> docks = Docks();
 	for (int i = 1; i < docks.size(); ++i)
 		m_pWindow->tabifyDockWidget(docks[i - 1], docks[i]);
+	// A dock that comes to a window on the screen is not shown by itself.
+	pDock->show();
 	docks.front()->raise();
 }
 

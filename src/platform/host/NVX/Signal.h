@@ -53,6 +53,8 @@ public:
 		auto pCall = std::make_shared<VCall>(std::move(i_Callback));
 		VConnection connection{std::shared_ptr<std::atomic<bool>>(pCall, &pCall->m_bAlive)};
 		const std::lock_guard lock(m_Mutex);
+		// A signal that seldom fires must not gather what has gone.
+		Purge();
 		m_Entries.push_back({std::move(pCall), std::move(i_pDispatcher)});
 		return connection;
 	}

@@ -1,0 +1,32 @@
+#include "studio/DarkStyle.h"
+
+#include <QApplication>
+#include <gtest/gtest.h>
+
+#include <memory>
+
+namespace
+{
+
+/// One for all tests of the process, which ends before Qt's own statics do.
+class VApplication : public testing::Environment
+{
+public:
+	void SetUp() override
+	{
+		QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts);
+		m_pApplication = std::make_unique<QApplication>(m_Count, m_pArguments);
+		StudioHost::ApplyDarkStyle(*m_pApplication);
+	}
+	void TearDown() override { m_pApplication.reset(); }
+
+private:
+	int m_Count = 1;
+	char m_Name[5] = "test";
+	char* m_pArguments[2] = {m_Name, nullptr};
+	std::unique_ptr<QApplication> m_pApplication;
+};
+
+testing::Environment* const g_pApplication = testing::AddGlobalTestEnvironment(new VApplication);
+
+} // namespace

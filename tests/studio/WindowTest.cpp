@@ -1,0 +1,257 @@
+#include "Host.h"
+
+#include "NVX/IQuickWidget.h"
+#include "TesselPluginInterface/IParameter.h"
+#include "TesselPluginInterface/IParameterGroup.h"
+#include "TesselPluginInterface/PathTypes.h"
+#include "studio/LogModel.h"
+#include "studio/Preferences.h"
+#include "studio/PreferencesDialog.h"
+#include "studio/RetargetPanel.h"
+#include "studio/Services.h"
+#include "studio/StudioWindow.h"
+
+#include <QAbstractButton>
+#include <QAbstractItemView>
+#include <QAction>
+#include <QApplication>
+#include <QComboBox>
+#include <QDockWidget>
+#include <QDropEvent>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMenu>
+#include <QMimeData>
+#include <QQuickItem>
+#include <QQuickWidget>
+#include <QTest>
+
+namespace
+{
+
+using StudioHost::VPreferencesDialog;
+using StudioHost::VStudioWindow;
+
+const QString c_Source = QStringLiteral(RETARGET_SOURCE "/demo/performer.qrs");
+const QString c_Fbx = QStringLiteral(RETARGET_SOURCE "/demo/character.fbx");
+
+class Window : public testing::Test, protected VScratchSettings
+{
+protected:
+	void SetUp() override { Restart(); }
+
+	/// The next run of the program.
+	void Restart()
+	{
+		m_pWindow.reset();
+		m_pWindow = std::make_unique<VStudioWindow>(m_Settings);
+		m_pWindow->show();
+	}
+
+	void LoadPanel() { ASSERT_TRUE(m_pWindow->LoadModule(RETARGET_MODULE)); }
+
+	std::string Parameter(const char* i_pName)
+	{
+		const auto pGroup = m_pWindow->Context().GetParameterRegistry()->Find("RetargetSetup", "Subject");
+		return pGroup ? pGroup->Find(i_pName)->GetValueText() : "no group";
+	}
+
+	QVariant RootProperty(const char* i_pName)
+	{
+		return qobject_cast<QQuickWidget*>(m_pWindow->RetargetPanel()->Widget())->rootObject()->property(i_pName);
+	}
+
+	/// @return whether the window takes the files.
+	bool Drop(const QStringList& i_rFiles)
+	{
+		QMimeData data;
+		QList<QUrl> urls;
+		for (const QString& rFile : i_rFiles)
+			urls << QUrl::fromLocalFile(rFile);
+		data.setUrls(urls);
+		QDragEnterEvent enter({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, {});
+		QApplication::sendEvent(m_pWindow.get(), &enter);
+		if (!enter.isAccepted())
+			return false;
+		EXPECT_EQ(enter.dropAction(), Qt::CopyAction);
+		QDropEvent drop({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, {});
+		QApplication::sendEvent(m_pWindow.get(), &drop);
+		RunEvents();
+		return true;
+	}
+
+	QStringList RecentFiles() { return m_Settings.value("RecentFiles").toStringList(); }
+
+	QAction& Action(const char* i_pName) { return *m_pWindow->findChild<QAction*>(i_pName); }
+
+	std::unique_ptr<VStudioWindow> m_pWindow;
+	VMessages m_Messages;
+};
+
+TEST_F(Window, TakesDroppedFilesByKind)
+{
+	LoadPanel();
+	const QString note = WriteFile(Path("note.txt"), "no model");
+	const QString broken = WriteFile(Path("broken.qrr"), "no xml");
+	const QString target = Path("performer.qrr");
+	ASSERT_TRUE(QFile::copy(c_Source, target));
+
+	EXPECT_FALSE(Drop({note}));
+	EXPECT_TRUE(Drop({target, note, c_Fbx, c_Source}));
+	EXPECT_EQ(m_Messages.Take(),
+	    "Import: " + note.toStdString() + " is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx\n");
+	EXPECT_EQ(Parameter("SourceSkeleton"), c_Source.toStdString());
+	EXPECT_EQ(Parameter("TargetFBX"), c_Fbx.toStdString());
+	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));
+	EXPECT_EQ(RecentFiles(), (QStringList{target, c_Fbx, c_Source}));
+
+	// What cannot be loaded is told, and never becomes the file that is saved to.
+	EXPECT_TRUE(Drop({broken}));
+	EXPECT_NE(m_Messages.Take().find("Command: LoadTargetSubjectURL did nothing: "), std::string::npos);
+	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));
+	EXPECT_TRUE(Drop({Path("gone.fbx")}));
+	EXPECT_EQ(m_Messages.Take(), "Import: " + Path("gone.fbx").toStdString() + " does not exist\n");
+	EXPECT_EQ(RecentFiles().size(), 3);
+}
+
+TEST_F(Window, OpensFilesUsedLast)
+{
+	LoadPanel();
+	m_pWindow->Open(c_Source);
+	m_pWindow->Open(c_Fbx);
+	RunEvents();
+	Restart();
+	LoadPanel();
+	QMenu& rMenu = *m_pWindow->findChild<QMenu*>("RecentMenu");
+	ASSERT_GE(rMenu.actions().size(), 2);
+	EXPECT_EQ(rMenu.actions()[0]->text(), "&1  " + c_Fbx);
+	rMenu.actions()[1]->trigger();
+	EXPECT_EQ(RecentFiles(), (QStringList{c_Source, c_Fbx}));
+	Action("ClearRecentFiles").trigger();
+	EXPECT_FALSE(rMenu.isEnabled());
+}
+
+TEST_F(Window, KeepsWhatThePanelWasSetTo)
+{
+	LoadPanel();
+	m_pWindow->Open(c_Source);
+	RunEvents();
+	Restart();
+	LoadPanel();
+	RunEvents();
+	EXPECT_EQ(Parameter("SourceSkeleton"), c_Source.toStdString());
+}
+
+TEST_F(Window, ExplainsSilentCommands)
+{
+	LoadPanel();
+	Action("FrameSelected").trigger();
+	Action("ScaleUpManipulator").trigger();
+	EXPECT_EQ(m_Messages.Take(), "") << "the panel knows these";
+	auto* const pPanel = dynamic_cast<NVX::IQuickWidget*>(m_pWindow->RetargetPanel()->Widget());
+	QMetaObject::invokeMethod(pPanel->contextProperty("ContextRetargetSetup").value<QObject*>(), "CreateTargetSubject");
+	RunEvents();
+	const std::string message = m_Messages.Take();
+	EXPECT_EQ(message.find("Command: CreateTargetSubject did nothing: "), 0u) << message;
+	const QAbstractItemModel& rLog = m_pWindow->Log();
+	const int last = rLog.rowCount() - 1;
+	EXPECT_EQ(rLog.index(last, StudioHost::VLogModel::ECategory).data().toString(), "Command");
+}
+
+TEST_F(Window, SaysWhyThereIsNoPanel)
+{
+	EXPECT_FALSE(m_pWindow->LoadModule(Path("None.so")));
+	const auto& rNotice = *m_pWindow->findChild<QLabel*>("Notice");
+	EXPECT_TRUE(rNotice.isVisible());
+	EXPECT_EQ(rNotice.text(), "No module is loaded: " + Path("None.so") + " does not exist");
+	Action("FrameSelected").trigger();
+	EXPECT_NE(m_Messages.Take().find("no panel knows the command"), std::string::npos);
+}
+
+TEST_F(Window, KeepsItsLayout)
+{
+	LoadPanel();
+	auto* const pLog = m_pWindow->findChild<QDockWidget*>("LogDock");
+	EXPECT_TRUE(pLog->isVisible());
+	pLog->toggleViewAction()->trigger();
+	m_pWindow->resize(1500, 950);
+	RunEvents();
+	const QSize size = m_pWindow->size();
+	m_pWindow->close();
+	Restart();
+	LoadPanel();
+	m_pWindow->RestoreLayout();
+	m_pWindow->show();
+	RunEvents();
+	EXPECT_FALSE(m_pWindow->findChild<QDockWidget*>("LogDock")->isVisible());
+	EXPECT_EQ(m_pWindow->size(), size);
+	EXPECT_TRUE(m_pWindow->RetargetPanel()->Widget()->isVisible());
+}
+
+TEST_F(Window, PreferencesHaveARowForEachFolder)
+{
+	StudioHost::VPreferences& rPreferences = m_pWindow->Context().Preferences();
+	std::vector<std::string> keys(
+	    TesselPluginInterface::c_FolderKeys.begin(), TesselPluginInterface::c_FolderKeys.end());
+	keys.insert(keys.end(), {"ProductFolderOrlexRally", "ProductFolderOrlexStage"});
+	{
+		VPreferencesDialog dialog(rPreferences);
+		for (const std::string& rKey : keys)
+		{
+			auto* const pEdit = dialog.findChild<QLineEdit*>(QString::fromStdString(rKey));
+			ASSERT_TRUE(pEdit) << rKey;
+			EXPECT_TRUE(pEdit->text().isEmpty());
+			QTest::keyClicks(pEdit, QString::fromStdString("/none/" + rKey));
+			EXPECT_TRUE(
+			    dialog.findChild<QLabel*>(QString::fromStdString(rKey + "Warning"))->text().contains("not there"));
+		}
+		auto* const pAlt = dialog.findChild<QComboBox*>(TesselPluginInterface::c_NavigationAltKey);
+		EXPECT_EQ(pAlt->currentData(), 1);
+		pAlt->setCurrentIndex(1);
+		EXPECT_TRUE(rPreferences.Folder(keys.front()).empty()) << "nothing is taken over before it is asked for";
+		QTest::mouseClick(dialog.findChild<QAbstractButton*>("PreferencesOk"), Qt::LeftButton);
+		EXPECT_EQ(dialog.result(), QDialog::Accepted);
+	}
+	for (const std::string& rKey : keys)
+		EXPECT_EQ(rPreferences.Folder(rKey), "/none/" + rKey);
+	EXPECT_EQ(rPreferences.Number(TesselPluginInterface::c_NavigationAltKey, 1), 0);
+
+	// The next run has them, and an empty field takes a folder away.
+	Restart();
+	VPreferencesDialog dialog(m_pWindow->Context().Preferences());
+	auto* const pSkins = dialog.findChild<QLineEdit*>("FolderSkins");
+	EXPECT_EQ(pSkins->text(), "/none/FolderSkins");
+	pSkins->clear();
+	dialog.Apply();
+	EXPECT_TRUE(m_pWindow->Context().Preferences().Folder("FolderSkins").empty());
+}
+
+TEST_F(Window, AllControlsAreNamed)
+{
+	LoadPanel();
+	VPreferencesDialog dialog(m_pWindow->Context().Preferences());
+	int count = 0;
+	for (const QWidget* pRoot : {static_cast<QWidget*>(m_pWindow.get()), static_cast<QWidget*>(&dialog)})
+	{
+		for (const QWidget* pWidget : pRoot->findChildren<QWidget*>())
+		{
+			const bool bControl = qobject_cast<const QAbstractButton*>(pWidget)
+			    || qobject_cast<const QLineEdit*>(pWidget) || qobject_cast<const QComboBox*>(pWidget)
+			    || qobject_cast<const QAbstractItemView*>(pWidget) || qobject_cast<const QDockWidget*>(pWidget)
+			    || qobject_cast<const QMenu*>(pWidget);
+			// Parts of Qt's own controls.
+			const QWidget* const pParent = pWidget->parentWidget();
+			const bool bPart = pWidget->objectName().startsWith("qt_") || pWidget->inherits("QLineEditIconButton")
+			    || pWidget->inherits("QTableCornerButton") || pWidget->inherits("QHeaderView") || IsExtension(pWidget)
+			    || (pParent && (pParent->inherits("QComboBoxPrivateContainer") || pParent->objectName().startsWith("qt_")));
+			if (!bControl || bPart)
+				continue;
+			++count;
+			EXPECT_FALSE(pWidget->objectName().isEmpty()) << pWidget->metaObject()->className();
+			EXPECT_FALSE(pWidget->accessibleName().isEmpty()) << pWidget->objectName().toStdString();
+		}
+	}
+	EXPECT_GT(count, 30);
+}
+
+} // namespace
