@@ -21,6 +21,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
+#include <QMenuBar>
 #include <QMimeData>
 #include <QQuickItem>
 #include <QQuickWidget>
@@ -34,6 +35,13 @@ using StudioHost::VStudioWindow;
 
 const QString c_Source = QStringLiteral(RETARGET_SOURCE "/demo/performer.qrs");
 const QString c_Fbx = QStringLiteral(RETARGET_SOURCE "/demo/character.fbx");
+
+/// The menu bar's menu for what does not fit.
+bool IsExtension(const QWidget* i_pWidget)
+{
+	return qobject_cast<const QMenu*>(i_pWidget) && i_pWidget->objectName().isEmpty()
+	    && qobject_cast<const QMenuBar*>(i_pWidget->parentWidget());
+}
 
 class Window : public testing::Test, protected VScratchSettings
 {
@@ -243,7 +251,8 @@ TEST_F(Window, AllControlsAreNamed)
 			const QWidget* const pParent = pWidget->parentWidget();
 			const bool bPart = pWidget->objectName().startsWith("qt_") || pWidget->inherits("QLineEditIconButton")
 			    || pWidget->inherits("QTableCornerButton") || pWidget->inherits("QHeaderView") || IsExtension(pWidget)
-			    || (pParent && (pParent->inherits("QComboBoxPrivateContainer") || pParent->objectName().startsWith("qt_")));
+			    || (pParent
+			        && (pParent->inherits("QComboBoxPrivateContainer") || pParent->objectName().startsWith("qt_")));
 			if (!bControl || bPart)
 				continue;
 			++count;

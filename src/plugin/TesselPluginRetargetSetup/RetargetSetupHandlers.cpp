@@ -42,7 +42,7 @@ bool IsSameText(const VShownTarget& i_rA, const VShownTarget& i_rB)
 void VRetargetSetupWidget::ConnectParameters()
 {
 	const auto connect = [this](const auto& i_rpParameter, void (VRetargetSetupWidget::*i_pHandler)())
-	{ i_rpParameter->ConnectValue(Guarded(this, i_pHandler), m_pDispatcher); };
+	{ m_Connections.push_back(i_rpParameter->ConnectValue(Guarded(this, i_pHandler), m_pDispatcher)); };
 	connect(m_Parameters.m_pSourceSkeleton, &VRetargetSetupWidget::OnSourceSkeletonChanged);
 	connect(m_Parameters.m_pSourceSkin, &VRetargetSetupWidget::OnSourceSkeletonChanged);
 	connect(m_Parameters.m_pTargetFBX, &VRetargetSetupWidget::OnTargetFBXChanged);
@@ -51,8 +51,8 @@ void VRetargetSetupWidget::ConnectParameters()
 	connect(m_Parameters.m_pTargetWeight, &VRetargetSetupWidget::OnTargetParametersChanged);
 	for (const auto& rpState : m_Parameters.m_pTargetState)
 		connect(rpState, &VRetargetSetupWidget::OnTargetParametersChanged);
-	m_pPreferenceFolders->ChangedSignal().Connect(
-	    Guarded(this, &VRetargetSetupWidget::OnFolderPreferenceChanged), m_pDispatcher);
+	m_Connections.push_back(m_pPreferenceFolders->ChangedSignal().Connect(
+	    Guarded(this, &VRetargetSetupWidget::OnFolderPreferenceChanged), m_pDispatcher));
 }
 
 void VRetargetSetupWidget::ApplyStoredValues()

@@ -79,6 +79,8 @@ VRetargetSetupWidget::VRetargetSetupWidget(std::shared_ptr<TesselPluginInterface
 
 VRetargetSetupWidget::~VRetargetSetupWidget()
 {
+	for (NVX::VConnection& rConnection : m_Connections)
+		rConnection.Disconnect();
 	// What the QML shows ends with the members.
 	ReleaseContent();
 }

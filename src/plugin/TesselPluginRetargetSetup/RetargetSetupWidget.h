@@ -8,6 +8,7 @@
 
 #include <memory>
 #include <optional>
+#include <vector>
 
 class VRetargetSetup;
 class VRetargetSetupScene;
@@ -94,6 +95,9 @@ private:
 	const std::shared_ptr<VRetargetSetup> m_pRetargetSetup;
 	const std::shared_ptr<VRetargetSetupSelection> m_pSelection;
 	const std::shared_ptr<VRetargetSetupScene> m_pScene;
+
+	/// To signals of the host, which outlive the panel and may not fire for long.
+	std::vector<NVX::VConnection> m_Connections;
 
 	/// Nobody else has given the skin cache folders.
 	const bool m_bOwnSkinFolders;
