@@ -2,6 +2,7 @@
 
 #include "CoreGraphics/Buffers.h"
 #include "CoreGraphics/ShaderProgram.h"
+#include "CoreGraphics/Texture.h"
 #include "CoreGraphics/VertexFormat.h"
 
 #include <QColor>
@@ -53,6 +54,7 @@ void VRenderContext::Initialise()
 	// Resolved by the context, once for all who ask.
 	m_pFunctions = m_pContext->functions();
 	SetClearColour(QColor(25, 25, 25, 255));
+	VTexture::DeleteReleased();
 }
 
 void VRenderContext::ResetState()

@@ -9,6 +9,9 @@
 
 #include <algorithm>
 #include <array>
+#include <mutex>
+#include <utility>
+#include <vector>
 
 #ifndef GL_R8
 #define GL_R8 0x8229
@@ -89,10 +92,44 @@ struct VTexture::VObject
 	QPointer<QOpenGLContextGroup> m_pGroup;
 };
 
+namespace
+{
+
+/// Textures whose owners had no context when they let go of them.
+struct VReleased
+{
+	std::mutex m_Mutex;
+	std::vector<std::pair<QPointer<QOpenGLContextGroup>, GLuint>> m_Textures;
+};
+
+VReleased& Released()
+{
+	static VReleased s_Released;
+	return s_Released;
+}
+
+} // namespace
+
+void VTexture::DeleteReleased()
+{
+	VReleased& rReleased = Released();
+	const std::lock_guard lock(rReleased.m_Mutex);
+	// Those of a group that is gone went with it.
+	std::erase_if(rReleased.m_Textures,
+	    [&](const auto& i_rTexture)
+	    {
+		    const bool bHere = i_rTexture.first == QOpenGLContext::currentContext()->shareGroup();
+		    if (bHere)
+			    Functions().glDeleteTextures(1, &i_rTexture.second);
+		    return bHere || !i_rTexture.first;
+	    });
+}
+
 VTexture::VTexture(std::uint32_t i_InternalFormat, const QSize& i_Size, bool i_bMipmaps)
     : m_pObject(std::make_unique<VObject>()), m_InternalFormat(i_InternalFormat), m_Size(i_Size), m_bMipmaps(i_bMipmaps)
 {
-	QOpenGLContext* pContext = QOpenGLContext::currentContext();
+	DeleteReleased();
+	QOpenGLContext* const pContext = QOpenGLContext::currentContext();
 	QOpenGLFunctions& rGL = Functions();
 	m_pObject->m_pGroup = pContext->shareGroup();
 	rGL.glGenTextures(1, &m_pObject->m_Texture);
@@ -100,22 +137,40 @@ VTexture::VTexture(std::uint32_t i_InternalFormat, const QSize& i_Size, bool i_b
 		return;
 	rGL.glBindTexture(GL_TEXTURE_2D, m_pObject->m_Texture);
 	const VUpload upload = UploadOf(m_InternalFormat);
-	rGL.glTexImage2D(GL_TEXTURE_2D, 0, static_cast<GLint>(m_InternalFormat), m_Size.width(), m_Size.height(), 0,
+	// OpenGL 2.1 itself has no textures of one channel.
+	const bool bOneChannel = pContext->format().majorVersion() >= 3 || pContext->hasExtension("GL_ARB_texture_rg");
+	const GLenum internalFormat = m_InternalFormat == GL_R8 && !bOneChannel ? GL_LUMINANCE : m_InternalFormat;
+	rGL.glTexImage2D(GL_TEXTURE_2D, 0, static_cast<GLint>(internalFormat), m_Size.width(), m_Size.height(), 0,
 	    upload.m_Format, upload.m_Type, nullptr);
 }
 
 VTexture::~VTexture()
 {
-	const QOpenGLContext* pContext = QOpenGLContext::currentContext();
-	if (pContext && m_pObject->m_pGroup == pContext->shareGroup())
+	if (IsUsable())
+	{
 		Functions().glDeleteTextures(1, &m_pObject->m_Texture);
+		return;
+	}
+	const std::lock_guard lock(Released().m_Mutex);
+	Released().m_Textures.emplace_back(m_pObject->m_pGroup, m_pObject->m_Texture);
+}
+
+bool VTexture::IsUsable() const
+{
+	const QOpenGLContext* const pContext = QOpenGLContext::currentContext();
+	return pContext && m_pObject->m_pGroup == pContext->shareGroup();
 }
 
 std::shared_ptr<VTexture> VTexture::FromImage(const QImage& i_rImage)
 {
 	if (i_rImage.isNull())
 		return {};
-	const QImage image = i_rImage.convertToFormat(QImage::Format_RGBA8888);
+	QImage image = i_rImage.convertToFormat(QImage::Format_RGBA8888);
+	GLint largest = 0;
+	Functions().glGetIntegerv(GL_MAX_TEXTURE_SIZE, &largest);
+	if (image.width() > largest || image.height() > largest)
+		image = image.scaled(
+		    image.size().boundedTo(QSize(largest, largest)), Qt::IgnoreAspectRatio, Qt::SmoothTransformation);
 	auto pTexture = std::make_shared<VTexture>(GL_RGBA8, image.size(), true);
 	// Rows of four-byte texels have no padding.
 	pTexture->Upload(image.constBits());

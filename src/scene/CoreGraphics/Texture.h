@@ -62,8 +62,8 @@ struct VTextureForm
 };
 VTextureForm FormOf(EPixelFormat i_Format);
 
-/// A picture in OpenGL. Every method and the destructor need a context of one share group to be current; a texture that
-/// is let go of without one goes with its group.
+/// A picture in OpenGL, in the share group of the context that was current when it was made. Every method needs a
+/// context of that group to be current; the destructor does not.
 class VTexture
 {
 public:
@@ -75,7 +75,14 @@ public:
 	VTexture(const VTexture&) = delete;
 	VTexture& operator=(const VTexture&) = delete;
 
-	/// With mipmaps, first row at texture coordinate 0. Empty if the image is.
+	/// Deletes the textures of the current share group whose owners let go of them without a context. Making a texture
+	/// and VRenderContext::Initialise do it.
+	static void DeleteReleased();
+
+	/// Whether a context of its share group is current. A texture that is of another one has to be made again.
+	bool IsUsable() const;
+
+	/// With mipmaps, no larger than OpenGL takes it, first row at texture coordinate 0. Empty if the image is.
 	static std::shared_ptr<VTexture> FromImage(const QImage& i_rImage);
 
 	/// @param i_pTexels rows without padding, as many bytes as size and format ask for: three or four bytes, one byte,

@@ -1,5 +1,7 @@
 #include "Flow2Graphics/FlowScene.h"
 
+#include "OrlexGraphics/RenderAxis.h"
+#include "OrlexGraphics/RenderFloorGrid.h"
 #include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/RenderOutlines.h"
 #include "OrlexGraphics/SelectionRegistry.h"
@@ -20,10 +22,13 @@ void VFlowScene::InitialiseGL()
 	VOrlexScene::InitialiseGL();
 	if (m_pRenderManipulator)
 		return;
+	// In the order of drawing.
+	m_RenderList.push_back(std::make_shared<OrlexGraphics::VRenderFloorGrid>(*m_pShaderLibrary));
 	m_pRenderManipulator =
 	    std::make_shared<OrlexGraphics::VRenderManipulator>(*m_pShaderLibrary, m_pRegistry, SelectionManager());
 	m_pManipulator = m_pRenderManipulator;
 	m_RenderList.push_back(m_pRenderManipulator);
+	m_RenderList.push_back(std::make_shared<OrlexGraphics::VRenderAxis>(*m_pShaderLibrary));
 	m_PostList.push_back(std::make_shared<OrlexGraphics::VRenderOutlines>(*m_pShaderLibrary, m_pRegistry));
 }
 

@@ -12,6 +12,8 @@
 
 #include <QOpenGLContext>
 
+#include <algorithm>
+
 namespace OrlexGraphics
 {
 
@@ -247,13 +249,12 @@ void VRenderManipulator::RenderAxis(VRenderContext& io_rContext, std::uint32_t i
 	}
 	if (begin(EManipulatorPlane))
 	{
-		// Two sides of a square, which end where they meet.
-		for (std::uint32_t side = 0; side < 2; ++side)
-		{
-			const QMatrix4x4 place =
-			    (side == 0 ? at(0.0f, c_PlaneOffset, 0.0f) : at(c_PlaneOffset, 0.0f, 0.0f)) * AxisRotation(side);
-			draw(rDrawing.m_Cylinder, place, QVector3D(c_ShaftRadius, c_ShaftRadius, c_PlaneOffset));
-		}
+		// The two far sides of a square between the other axes, where these are positive.
+		const float x = i_Axis == 0 ? -c_PlaneOffset : c_PlaneOffset;
+		const float y = i_Axis == 1 ? -c_PlaneOffset : c_PlaneOffset;
+		const QVector3D side(c_ShaftRadius, c_ShaftRadius, c_PlaneOffset);
+		draw(rDrawing.m_Cylinder, at(std::min(x, 0.0f), y, 0.0f) * AxisRotation(0), side);
+		draw(rDrawing.m_Cylinder, at(x, std::min(y, 0.0f), 0.0f) * AxisRotation(1), side);
 	}
 	if (rDrawing.m_Ring && begin(EManipulatorRing))
 		draw(*rDrawing.m_Ring, QMatrix4x4(), QVector3D(c_RingRadius, c_RingRadius, c_RingRadius));

@@ -1,0 +1,242 @@
+#include "../CoreGraphics/OffscreenContext.h"
+
+#include "CoreGraphics/CameraController.h"
+#include "CoreGraphics/RenderContext.h"
+#include "CoreGraphics/ShaderLibrary.h"
+#include "OrlexGraphics/RenderAxis.h"
+#include "OrlexGraphics/RenderFloorGrid.h"
+#include "OrlexGraphics/SceneOptions.h"
+
+#include <QColor>
+#include <QOpenGLFramebufferObject>
+
+#include <algorithm>
+#include <array>
+#include <cstring>
+#include <limits>
+
+using namespace OrlexGraphics;
+
+namespace
+{
+
+constexpr int c_Width = 600;
+constexpr int c_Height = 400;
+constexpr int c_Background = 100;
+
+using VColour = std::array<int, 3>;
+
+/// The floor and the corner's axes over a grey background.
+class RenderFloor : public GraphicsTest::InBothDialects
+{
+protected:
+	void SetUp() override
+	{
+		InBothDialects::SetUp();
+		m_Library.InitialiseGL();
+		m_Render.Initialise();
+		m_Render.ResetState();
+		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Width, c_Height, QOpenGLFramebufferObject::Depth);
+		m_Render.BindFramebuffer(m_pTarget.get());
+		m_pFloor = std::make_unique<VRenderFloorGrid>(m_Library);
+		m_pAxis = std::make_unique<VRenderAxis>(m_Library);
+		// 20 mm a pixel, the origin in the middle.
+		m_Camera.SetSize(QSize(c_Width, c_Height));
+		m_Camera.m_OrthographicScale = 20.0f;
+		m_Camera.m_Type = CoreGraphics::ECameraTop;
+	}
+
+	/// From the pass alone.
+	void Draw(IRenderType& io_rType, std::uint32_t i_Pass)
+	{
+		m_Camera.Update();
+		m_Camera.Apply(m_Render);
+		m_Render.SetYUp(m_Camera.m_bYUp);
+		m_Render.SetClearColour(QColor(c_Background, c_Background, c_Background));
+		m_Render.ClearBuffers(true, true);
+		io_rType.Render(m_Render, m_Options, i_Pass);
+		m_Render.ReadPixels(QRect(0, 0, c_Width, c_Height), m_Pixels);
+		EXPECT_EQ(m_Render.m_Viewport, QRect(0, 0, c_Width, c_Height));
+	}
+
+	VColour Pixel(int i_X, int i_Y) const
+	{
+		const auto first = m_Pixels.begin() + 4 * (i_Y * c_Width + i_X);
+		return {first[0], first[1], first[2]};
+	}
+
+	/// What the pass drew, from the lower left corner.
+	QRect Extent() const
+	{
+		const std::array<std::uint8_t, 4> background{c_Background, c_Background, c_Background, 255};
+		QRect extent;
+		const std::uint8_t* pPixel = m_Pixels.data();
+		for (int i = 0; i < c_Width * c_Height; ++i, pPixel += 4)
+		{
+			if (std::memcmp(pPixel, background.data(), 3) != 0)
+				extent |= QRect(i % c_Width, i / c_Width, 1, 1);
+		}
+		return extent;
+	}
+
+	/// Edges that lie between two pixels may fall to either.
+	static void ExpectNear(const QRect& i_rActual, const QRect& i_rExpected)
+	{
+		EXPECT_NEAR(i_rActual.left(), i_rExpected.left(), 1);
+		EXPECT_NEAR(i_rActual.right(), i_rExpected.right(), 1);
+		EXPECT_NEAR(i_rActual.top(), i_rExpected.top(), 1);
+		EXPECT_NEAR(i_rActual.bottom(), i_rExpected.bottom(), 1);
+	}
+
+	CoreGraphics::VShaderLibrary m_Library;
+	CoreGraphics::VRenderContext m_Render;
+	CoreGraphics::VCameraController m_Camera;
+	VSceneOptions m_Options;
+	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
+	std::unique_ptr<VRenderFloorGrid> m_pFloor;
+	std::unique_ptr<VRenderAxis> m_pAxis;
+	std::vector<std::uint8_t> m_Pixels;
+};
+INSTANTIATE_IN_BOTH_DIALECTS(RenderFloor);
+
+} // namespace
+
+TEST_P(RenderFloor, IsOpaqueOrSeenThroughFromEitherSide)
+{
+	struct VRow
+	{
+		std::uint32_t m_Type;
+		bool m_bTranslucent;
+		float m_Alpha;
+	};
+	const VRow rows[] = {{CoreGraphics::ECameraTop, true, 0.75f}, {CoreGraphics::ECameraBottom, true, 0.25f},
+	    {CoreGraphics::ECameraTop, false, 1.0f}, {CoreGraphics::ECameraBottom, false, 1.0f}};
+	// 5 mm a pixel: 300 pixels, from the middle.
+	m_Camera.m_OrthographicScale = 5.0f;
+	m_pFloor->SetFloor(VFloor{-750, -750, 750, 750, 500.0f, 10});
+	for (const bool bYUp : {false, true})
+	{
+		for (const VRow& rRow : rows)
+		{
+			SCOPED_TRACE(testing::Message() << rRow.m_Type << rRow.m_bTranslucent << bYUp);
+			m_Camera.m_Type = rRow.m_Type;
+			m_Camera.m_bYUp = bYUp;
+			m_Options.m_bFloorGridIsTranslucent = rRow.m_bTranslucent;
+			Draw(*m_pFloor, rRow.m_bTranslucent ? EPassOpaque : EPassTransparent);
+			EXPECT_TRUE(Extent().isEmpty());
+			Draw(*m_pFloor, rRow.m_bTranslucent ? EPassTransparent : EPassOpaque);
+			ExpectNear(Extent(), QRect(150, 50, 301, 301));
+			// Halfway between all lines a grey of 0.2, over the background.
+			const float expected = rRow.m_Alpha * 51.0f + (1.0f - rRow.m_Alpha) * c_Background;
+			EXPECT_NEAR(static_cast<float>(Pixel(300 + 55, 200 + 45)[0]), expected, 3.0f);
+			// The strips along the axes, and the edge, are not seen through.
+			const int edge = Extent().left();
+			for (const VColour& rColour : {Pixel(300, 325), Pixel(399, 200), Pixel(edge, 325)})
+			{
+				for (const int channel : rColour)
+					EXPECT_NEAR(channel, 128, 1);
+			}
+			// A large line at 500 mm is brighter than what lies beside it.
+			EXPECT_GT(std::max({Pixel(399, 245)[0], Pixel(400, 245)[0]}), Pixel(395, 245)[0] + 10);
+		}
+	}
+}
+
+TEST_P(RenderFloor, IsDrawnWithItsOptionForTheEyeAlone)
+{
+	for (const std::uint32_t mode : {CoreGraphics::ERenderPick, CoreGraphics::ERenderId})
+	{
+		m_Render.m_Mode = mode;
+		for (const std::uint32_t pass : {EPassOpaque, EPassTransparent, EPassOverlay})
+		{
+			Draw(*m_pFloor, pass);
+			EXPECT_TRUE(Extent().isEmpty());
+			Draw(*m_pAxis, pass);
+			EXPECT_TRUE(Extent().isEmpty());
+		}
+	}
+	m_Render.m_Mode = CoreGraphics::ERenderNormal;
+	m_Options.m_bFloorGrid = false;
+	Draw(*m_pFloor, EPassTransparent);
+	EXPECT_TRUE(Extent().isEmpty());
+}
+
+TEST_P(RenderFloor, TakesTheFloorThatItIsGiven)
+{
+	struct VRow
+	{
+		float m_Metres;
+		VFloor m_Expected;
+	};
+	const float infinity = std::numeric_limits<float>::infinity();
+	for (const VRow& rRow : {VRow{6.0f, {-3000, -3000, 3000, 3000, 1000.0f, 10}}, {0.5f, {-250, -250, 250, 250}},
+	         {-1.0f, {0, 0, 0, 0}}, {std::numeric_limits<float>::quiet_NaN(), {0, 0, 0, 0}},
+	         {infinity, {-1000000000, -1000000000, 1000000000, 1000000000}}})
+	{
+		m_Options.m_FloorGridSize = rRow.m_Metres;
+		EXPECT_EQ(m_pFloor->GetFloor(m_Options), rRow.m_Expected) << rRow.m_Metres;
+	}
+	const VFloor given{-1000, -2000, 3000, 400, 500.0f, 5};
+	m_pFloor->SetFloor(given);
+	EXPECT_EQ(m_pFloor->GetFloor(m_Options), given);
+	Draw(*m_pFloor, EPassTransparent);
+	// From above, with X to the left and Y down.
+	ExpectNear(Extent(), QRect(150, 180, 201, 121));
+}
+
+TEST_P(RenderFloor, AnOpaqueFloorHidesWhatIsBelowATranslucentOneDoesNot)
+{
+	for (const bool bTranslucent : {false, true})
+	{
+		m_Options.m_bFloorGridIsTranslucent = bTranslucent;
+		Draw(*m_pFloor, bTranslucent ? EPassTransparent : EPassOpaque);
+		// A second floor, a hair below the first, is another one only where nothing wrote depth.
+		const std::vector<std::uint8_t> once = m_Pixels;
+		m_Camera.m_Centre.setZ(100.0f);
+		m_Camera.Update();
+		m_Camera.Apply(m_Render);
+		m_pFloor->Render(m_Render, m_Options, bTranslucent ? EPassTransparent : EPassOpaque);
+		m_Render.ReadPixels(QRect(0, 0, c_Width, c_Height), m_Pixels);
+		EXPECT_EQ(m_Pixels == once, !bTranslucent);
+		m_Camera.m_Centre.setZ(0.0f);
+	}
+}
+
+TEST_P(RenderFloor, AxesStandInTheCorner)
+{
+	for (const auto& [rViewport, rCorner] :
+	    {std::pair(QRect(0, 0, 600, 400), QRect(0, 0, 100, 100)), {QRect(0, 0, 4000, 3000), QRect(0, 0, 100, 100)},
+	        {QRect(10, 20, 300, 200), QRect(10, 20, 50, 50)}, {QRect(0, 0, 0, 0), QRect(0, 0, 0, 0)}})
+		EXPECT_EQ(VRenderAxis::Corner(rViewport), rCorner);
+
+	// From the right: Y points to the right, Z up, X at the eye.
+	m_Camera.m_Type = CoreGraphics::ECameraRight;
+	Draw(*m_pAxis, EPassOverlay);
+	EXPECT_TRUE(QRect(0, 0, 100, 100).contains(Extent()));
+	EXPECT_NEAR(Extent().right(), 90, 1);
+	EXPECT_NEAR(Extent().bottom(), 90, 1);
+	EXPECT_EQ(std::max(Pixel(70, 49), Pixel(70, 50),
+	              [](const VColour& i_rA, const VColour& i_rB) { return i_rA[1] < i_rB[1]; }),
+	    (VColour{0, 255, 0}));
+	EXPECT_EQ(std::max(Pixel(49, 70), Pixel(50, 70),
+	              [](const VColour& i_rA, const VColour& i_rB) { return i_rA[2] < i_rB[2]; }),
+	    (VColour{0, 0, 255}));
+	// Where the camera is has no part in it.
+	const std::vector<std::uint8_t> before = m_Pixels;
+	m_Camera.m_Centre = QVector3D(5000, -300, 80);
+	Draw(*m_pAxis, EPassOverlay);
+	EXPECT_EQ(m_Pixels, before);
+
+	for (const std::uint32_t pass : {EPassOpaque, EPassTransparent})
+	{
+		Draw(*m_pAxis, pass);
+		EXPECT_TRUE(Extent().isEmpty());
+	}
+	m_Options.m_OverlayCamera = "camera";
+	Draw(*m_pAxis, EPassOverlay);
+	EXPECT_TRUE(Extent().isEmpty());
+	m_Options.m_OverlayCamera.clear();
+	m_Options.m_bGlobalAxis = false;
+	Draw(*m_pAxis, EPassOverlay);
+	EXPECT_TRUE(Extent().isEmpty());
+}
