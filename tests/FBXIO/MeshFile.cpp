@@ -12,6 +12,11 @@ VTestRecord Record(const char* i_pName, std::vector<VTestValue> i_Values)
 	return {i_pName, std::move(i_Values), {}};
 }
 
+VTestValue Integers(const VNumbers& i_rNumbers)
+{
+	return VIntegers(i_rNumbers.begin(), i_rNumbers.end());
+}
+
 /// Adds objects and their connections, by numbers or by names.
 class VObjects
 {
@@ -81,13 +86,13 @@ void AddLayer(std::vector<VTestRecord>& io_rGeometry, const char* i_pName, const
 {
 	if (i_rLayer.m_Mapping.empty())
 		return;
-	VTestRecord layer = Record(i_pName, {std::int64_t(0)});
+	VTestRecord layer = Record(i_pName, {std::int32_t(0)});
 	layer.m_Children = {Record("MappingInformationType", {i_rLayer.m_Mapping}),
 	    Record("ReferenceInformationType", {i_rLayer.m_Reference})};
 	if (*i_pDirect)
 		layer.m_Children.push_back(Record(i_pDirect, {i_rLayer.m_Direct}));
 	if (!i_rLayer.m_Index.empty())
-		layer.m_Children.push_back(Record(i_pIndex, {i_rLayer.m_Index}));
+		layer.m_Children.push_back(Record(i_pIndex, {Integers(i_rLayer.m_Index)}));
 	io_rGeometry.push_back(std::move(layer));
 }
 
@@ -137,10 +142,18 @@ std::string FbxTest::Write(
 		const VTestValue node = objects.NodeKey(rMesh.m_Node);
 		const std::string& rName = i_rScene.m_Nodes[rMesh.m_Node].m_Name;
 		std::vector<VTestRecord> geometry{
-		    Record("Vertices", {rMesh.m_Points}), Record("PolygonVertexIndex", {rMesh.m_Polygons})};
+		    Record("Vertices", {rMesh.m_Points}), Record("PolygonVertexIndex", {Integers(rMesh.m_Polygons)})};
 		AddLayer(geometry, "LayerElementNormal", "Normals", "NormalsIndex", rMesh.m_Normals);
 		AddLayer(geometry, "LayerElementUV", "UV", "UVIndex", rMesh.m_UV);
 		AddLayer(geometry, "LayerElementMaterial", "", "Materials", rMesh.m_MaterialLayer);
+		VTestRecord layer = Record("Layer", {std::int32_t(0)});
+		for (std::size_t i = 2; i < geometry.size(); ++i)
+		{
+			VTestRecord& rElement = layer.m_Children.emplace_back(Record("LayerElement", {}));
+			rElement.m_Children = {Record("Type", {geometry[i].m_Name}), Record("TypedIndex", {std::int32_t(0)})};
+		}
+		if (!layer.m_Children.empty())
+			geometry.push_back(std::move(layer));
 		VTestValue owner = node;
 		if (objects.IsNew())
 		{
@@ -155,14 +168,15 @@ std::string FbxTest::Write(
 		AddMaterials(objects, rMesh);
 		if (rMesh.m_Clusters.empty())
 			continue;
-		const VTestValue skin = objects.Add("Deformer", "skin of " + rName, "Skin", {});
+		const VTestValue skin =
+		    objects.Add("Deformer", "skin of " + rName, "Skin", {Record("Version", {std::int32_t(101)})});
 		objects.Connect(skin, owner);
 		for (std::size_t i = 0; i < rMesh.m_Clusters.size(); ++i)
 		{
 			const VTestCluster& rCluster = rMesh.m_Clusters[i];
 			std::vector<VTestRecord> children;
 			if (!rCluster.m_Points.empty())
-				children = {Record("Indexes", {rCluster.m_Points}), Record("Weights", {rCluster.m_Weights})};
+				children = {Record("Indexes", {Integers(rCluster.m_Points)}), Record("Weights", {rCluster.m_Weights})};
 			for (const auto& [pName, rMatrix] :
 			    {std::pair<const char*, const VNumbers&>{"Transform", rCluster.m_Transform},
 			        {"TransformLink", rCluster.m_Link}})

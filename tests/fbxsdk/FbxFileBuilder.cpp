@@ -11,23 +11,47 @@ using namespace FbxTest;
 namespace
 {
 
+template <typename T>
+std::string BinaryArray(char i_Type, const std::vector<T>& i_rNumbers)
+{
+	const std::string deflated =
+	    Deflate({reinterpret_cast<const char*>(i_rNumbers.data()), sizeof(T) * i_rNumbers.size()});
+	return Bytes(i_Type, std::uint32_t(i_rNumbers.size()), 1u, std::uint32_t(deflated.size()), deflated);
+}
+
 std::string BinaryValue(const VTestValue& i_rValue)
 {
 	if (const auto* const pInteger = std::get_if<std::int64_t>(&i_rValue))
 		return Bytes('L', *pInteger);
+	if (const auto* const pShort = std::get_if<std::int32_t>(&i_rValue))
+		return Bytes('I', *pShort);
 	if (const auto* const pReal = std::get_if<double>(&i_rValue))
 		return Bytes('D', *pReal);
 	if (const auto* const pRaw = std::get_if<VRaw>(&i_rValue))
 		return pRaw->m_Bytes;
 	if (const auto* const pNumbers = std::get_if<VNumbers>(&i_rValue))
-	{
-		const std::string deflated = Deflate({reinterpret_cast<const char*>(pNumbers->data()), 8 * pNumbers->size()});
-		return Bytes('d', std::uint32_t(pNumbers->size()), 1u, std::uint32_t(deflated.size()), deflated);
-	}
+		return BinaryArray('d', *pNumbers);
+	if (const auto* const pIntegers = std::get_if<VIntegers>(&i_rValue))
+		return BinaryArray('i', *pIntegers);
 	std::string text = std::get<std::string>(i_rValue);
 	if (const std::size_t at = text.find("::"); at != std::string::npos)
 		text = text.substr(at + 2) + std::string("\0\1", 2) + text.substr(0, at);
 	return Bytes('S', std::uint32_t(text.size()), text);
+}
+
+/// Before version 7 an array is a list of values.
+/// @return how many; 0 if it is no array.
+std::size_t WriteList(const VTestValue& i_rValue, std::string& io_rBytes)
+{
+	const auto write = [&](const auto* i_pNumbers) -> std::size_t
+	{
+		if (!i_pNumbers)
+			return 0;
+		for (const auto number : *i_pNumbers)
+			io_rBytes += BinaryValue(number);
+		return i_pNumbers->size();
+	};
+	return write(std::get_if<VNumbers>(&i_rValue)) + write(std::get_if<VIntegers>(&i_rValue));
 }
 
 class VBinaryWriter
@@ -44,13 +68,13 @@ public:
 		std::size_t count = 0;
 		for (const VTestValue& rValue : i_rRecord.m_Values)
 		{
-			const auto* const pNumbers = std::get_if<VNumbers>(&rValue);
-			if (pNumbers && m_Version < 7000)
-				for (const double number : *pNumbers)
-					values += BinaryValue(number);
-			else
-				values += BinaryValue(rValue);
-			count += pNumbers && m_Version < 7000 ? pNumbers->size() : 1;
+			const std::size_t before = count;
+			if (m_Version < 7000)
+				count += WriteList(rValue, values);
+			if (count != before)
+				continue;
+			values += BinaryValue(rValue);
+			++count;
 		}
 		const std::size_t start = m_Bytes.size();
 		Header(0, count, values.size(), i_rRecord.m_Name);
@@ -85,10 +109,11 @@ private:
 	std::string m_Bytes;
 };
 
-std::string Joined(const VNumbers& i_rNumbers)
+template <typename T>
+std::string Joined(const std::vector<T>& i_rNumbers)
 {
 	std::string text;
-	for (const double number : i_rNumbers)
+	for (const T number : i_rNumbers)
 	{
 		text += text.empty() ? "" : ",";
 		NumberText::AppendG17(text, number);
@@ -100,6 +125,12 @@ void WriteText(
     std::uint32_t i_Version, const VTestRecord& i_rRecord, const std::string& i_rIndent, std::string& io_rText)
 {
 	io_rText += i_rIndent + i_rRecord.m_Name + ": ";
+	const auto array = [&](const auto& i_rNumbers, std::size_t i_Count)
+	{
+		const std::string numbers = Joined(i_rNumbers);
+		return i_Version < 7000 ? numbers
+		                        : "*" + std::to_string(i_Count) + " {\n" + i_rIndent + "\ta: " + numbers + "\n}";
+	};
 	std::string separator;
 	for (const VTestValue& rValue : i_rRecord.m_Values)
 	{
@@ -107,12 +138,14 @@ void WriteText(
 		separator = ", ";
 		if (const auto* const pInteger = std::get_if<std::int64_t>(&rValue))
 			io_rText += std::to_string(*pInteger);
+		else if (const auto* const pShort = std::get_if<std::int32_t>(&rValue))
+			io_rText += std::to_string(*pShort);
 		else if (const auto* const pReal = std::get_if<double>(&rValue))
 			io_rText += NumberText::PrintG17(*pReal);
 		else if (const auto* const pNumbers = std::get_if<VNumbers>(&rValue))
-			io_rText += i_Version < 7000
-			    ? Joined(*pNumbers)
-			    : "*" + std::to_string(pNumbers->size()) + " {\n" + i_rIndent + "\ta: " + Joined(*pNumbers) + "\n}";
+			io_rText += array(*pNumbers, pNumbers->size());
+		else if (const auto* const pIntegers = std::get_if<VIntegers>(&rValue))
+			io_rText += array(*pIntegers, pIntegers->size());
 		else if (const auto* const pText = std::get_if<std::string>(&rValue))
 			io_rText += '"' + *pText + '"';
 	}
@@ -199,8 +232,8 @@ std::vector<VTestRecord> FbxTest::Records(const VTestForm& i_rForm, const VTestS
 		connect(nodeKey(child), nodeKey(parent));
 
 	VTestRecord header{"FBXHeaderExtension", {}, {}};
-	header.m_Children.push_back(record("FBXVersion", {std::int64_t(i_rForm.m_Version)}));
-	header.m_Children.push_back(record("EncryptionType", {i_rScene.m_EncryptionType}));
+	header.m_Children.push_back(record("FBXVersion", {std::int32_t(i_rForm.m_Version)}));
+	header.m_Children.push_back(record("EncryptionType", {std::int32_t(i_rScene.m_EncryptionType)}));
 	VTestRecord settings{"GlobalSettings", {}, {PropertyList(i_rForm.m_Version, i_rScene.m_Settings)}};
 	std::vector<VTestRecord> records{header};
 	if (bNew)

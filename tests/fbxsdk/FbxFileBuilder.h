@@ -13,12 +13,13 @@ namespace FbxTest
 
 /// Written as a deflated array in binary and as "*n { a: }" in text; before version 7 as a list of values.
 using VNumbers = std::vector<double>;
+using VIntegers = std::vector<std::int32_t>;
 /// Bytes that go into a binary file as they stand, type byte included.
 struct VRaw
 {
 	std::string m_Bytes;
 };
-using VTestValue = std::variant<std::int64_t, double, std::string, VNumbers, VRaw>;
+using VTestValue = std::variant<std::int64_t, std::int32_t, double, std::string, VNumbers, VIntegers, VRaw>;
 
 struct VTestRecord
 {

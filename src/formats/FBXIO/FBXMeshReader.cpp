@@ -21,7 +21,7 @@ constexpr std::size_t c_FirstLargeCount = 0x10000;
 
 struct VInfluence
 {
-	std::int64_t m_Bone = 0;
+	std::int32_t m_Bone = 0;
 	float m_Weight = 0.0f;
 };
 
@@ -267,15 +267,18 @@ void FBXIO::FBXMeshReader::ReadWeights(FbxNode& i_rNode, FbxSkin& i_rSkin, std::
 	{
 		broken = 0;
 		for (const auto& [pCluster, bone] : clusters)
-			for (int i = 0; i < pCluster->GetControlPointIndicesCount(); ++i)
+		{
+			const int* const pPoints = pCluster->GetControlPointIndices();
+			const double* const pWeights = pCluster->GetControlPointWeights();
+			for (int i = 0, count = pCluster->GetControlPointIndicesCount(); i < count; ++i)
 			{
-				const int point = pCluster->GetControlPointIndices()[i];
-				const float weight = float(pCluster->GetControlPointWeights()[i]);
-				if (point >= 0 && std::size_t(point) < io_rVertices.size() && std::isfinite(weight))
-					i_rVisit(std::size_t(point), VInfluence{bone, weight});
+				const float weight = float(pWeights[i]);
+				if (pPoints[i] >= 0 && std::size_t(pPoints[i]) < io_rVertices.size() && std::isfinite(weight))
+					i_rVisit(std::size_t(pPoints[i]), VInfluence{std::int32_t(bone), weight});
 				else
 					++broken;
 			}
+		}
 	};
 	// All lists in one: that of a point begins where the one before ends.
 	std::vector<std::size_t> ends(io_rVertices.size() + 1, 0);

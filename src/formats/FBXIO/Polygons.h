@@ -35,22 +35,23 @@ void ApplyTexCoords(
 			setCoordinate(io_rVertices[i], i);
 		return;
 	}
-	const bool bIndexed = pUV->GetReferenceMode() != FbxLayerElement::eDirect;
+	const auto* const pIndex = pUV->GetReferenceMode() != FbxLayerElement::eDirect ? &pUV->GetIndexArray() : nullptr;
+	const int entries = rDirect.GetCount();
 	constexpr std::uint32_t c_None = 0xFFFFFFFFu;
 	std::vector<std::uint32_t> vertexOfEntry(rDirect.GetCount(), c_None);
 	std::vector<TVertex> vertices;
 	vertices.reserve(rDirect.GetCount());
 	std::size_t moved = 0;
 	std::size_t missing = 0;
-	for (int polygon = 0; polygon < io_rFrom.GetPolygonCount(); ++polygon)
+	for (int polygon = 0, count = io_rFrom.GetPolygonCount(); polygon < count; ++polygon)
 	{
 		const int start = io_rFrom.GetPolygonVertexIndex(polygon);
-		for (int i = start; i < start + io_rFrom.GetPolygonSize(polygon); ++i)
+		const int end = start + io_rFrom.GetPolygonSize(polygon);
+		for (int i = start; i < end; ++i)
 		{
-			const bool bHasEntry = !bIndexed || i < pUV->GetIndexArray().GetCount();
-			const int entry = !bHasEntry ? -1 : bIndexed ? pUV->GetIndexArray().GetAt(i) : i;
+			const int entry = !pIndex ? i : i < pIndex->GetCount() ? pIndex->GetAt(i) : -1;
 			const TVertex& rPoint = io_rVertices[io_rIndices[i]];
-			if (entry < 0 || entry >= rDirect.GetCount())
+			if (entry < 0 || entry >= entries)
 			{
 				++missing;
 				io_rIndices[i] = std::uint32_t(vertices.size());
@@ -95,23 +96,24 @@ void SplitIntoParts(FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndi
 	for (int polygon = 0; polygon < count; ++polygon)
 		if (partOf(polygon) < triangles.size())
 			triangles[partOf(polygon)] += std::max(io_rFrom.GetPolygonSize(polygon) - 2, 0);
+	std::vector<std::uint8_t*> next(io_rParts.size());
 	for (std::size_t i = 0; i < io_rParts.size(); ++i)
 	{
 		io_rParts[i].m_IndexSize = sizeof(TIndex);
-		io_rParts[i].m_Indices.reserve(triangles[i] * 3 * sizeof(TIndex));
+		io_rParts[i].m_Indices.resize(triangles[i] * 3 * sizeof(TIndex));
+		next[i] = io_rParts[i].m_Indices.data();
 	}
 	for (int polygon = 0; polygon < count; ++polygon)
 	{
-		if (partOf(polygon) >= io_rParts.size())
+		const std::size_t part = partOf(polygon);
+		if (part >= io_rParts.size())
 			continue;
-		std::vector<std::uint8_t>& rBytes = io_rParts[partOf(polygon)].m_Indices;
-		const int size = io_rFrom.GetPolygonSize(polygon);
-		for (int i = 1; i + 1 < size; ++i)
+		const std::uint32_t* const p = i_rIndices.data() + io_rFrom.GetPolygonVertexIndex(polygon);
+		for (int i = 1, size = io_rFrom.GetPolygonSize(polygon); i + 1 < size; ++i)
 		{
-			const std::uint32_t* const p = i_rIndices.data() + io_rFrom.GetPolygonVertexIndex(polygon);
 			const TIndex triangle[3]{TIndex(p[0]), TIndex(p[i]), TIndex(p[i + 1])};
-			const auto* const pBytes = reinterpret_cast<const std::uint8_t*>(triangle);
-			rBytes.insert(rBytes.end(), pBytes, pBytes + sizeof(triangle));
+			std::memcpy(next[part], triangle, sizeof(triangle));
+			next[part] += sizeof(triangle);
 		}
 	}
 }

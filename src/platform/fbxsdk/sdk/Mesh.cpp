@@ -114,22 +114,6 @@ void fbxsdk::FbxMesh::CutPolygons() const
 		    GetName(), broken);
 }
 
-int fbxsdk::FbxMesh::GetPolygonCount() const
-{
-	Load();
-	return int(m_PolygonStarts.size());
-}
-
-int fbxsdk::FbxMesh::GetPolygonSize(int pPolygonIndex) const
-{
-	return pPolygonIndex >= 0 && pPolygonIndex < GetPolygonCount() ? m_PolygonSizes[pPolygonIndex] : -1;
-}
-
-int fbxsdk::FbxMesh::GetPolygonVertexIndex(int pPolygonIndex) const
-{
-	return pPolygonIndex >= 0 && pPolygonIndex < GetPolygonCount() ? m_PolygonStarts[pPolygonIndex] : -1;
-}
-
 int* fbxsdk::FbxMesh::GetPolygonVertices() const
 {
 	Load();

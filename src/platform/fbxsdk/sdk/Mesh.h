@@ -68,13 +68,24 @@ class FbxMesh : public FbxGeometry
 public:
 	FbxNodeAttribute::EType GetAttributeType() const override { return FbxNodeAttribute::eMesh; }
 
-	int GetPolygonCount() const;
+	int GetPolygonCount() const
+	{
+		if (!m_bLoaded)
+			Load();
+		return int(m_PolygonStarts.size());
+	}
 
-	/// 0 for a polygon that names control points that do not exist.
-	int GetPolygonSize(int pPolygonIndex) const;
+	/// 0 for a polygon that names control points that do not exist; -1 if there is no such polygon.
+	int GetPolygonSize(int pPolygonIndex) const
+	{
+		return pPolygonIndex >= 0 && pPolygonIndex < GetPolygonCount() ? m_PolygonSizes[pPolygonIndex] : -1;
+	}
 
 	/// The place of the polygon's first vertex in GetPolygonVertices; -1 if there is no such polygon.
-	int GetPolygonVertexIndex(int pPolygonIndex) const;
+	int GetPolygonVertexIndex(int pPolygonIndex) const
+	{
+		return pPolygonIndex >= 0 && pPolygonIndex < GetPolygonCount() ? m_PolygonStarts[pPolygonIndex] : -1;
+	}
 
 	/// The control points of all polygons, one behind the other. Those of polygons of size 0 may not exist.
 	int* GetPolygonVertices() const;
