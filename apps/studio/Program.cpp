@@ -35,6 +35,9 @@ std::shared_ptr<void> ShowMessagesOnTerminal(const CommandLine::VMessageSettings
 {
 	const int level = CommandLine::DefaultLevel(i_rSettings);
 	NVX::GlobalLog::SetDefaultLevel(std::max<int>(level, NVX::ELogInformation));
+	// Each start reads every preference, set or not.
+	if (i_rSettings.m_Verbose == 0)
+		NVX::GlobalLog::Category("Store").SetLevel(NVX::ELogWarning);
 	for (const auto& [rName, categoryLevel] : i_rSettings.m_CategoryLevels)
 		NVX::GlobalLog::Category(rName).SetLevel(categoryLevel);
 	return NVX::GlobalLog::AddSink(

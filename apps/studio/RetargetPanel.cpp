@@ -117,6 +117,13 @@ void VRetargetPanel::Save()
 		QMetaObject::invokeMethod(pDialog, "open");
 }
 
+bool VRetargetPanel::HasUnsavedChanges() const
+{
+	bool bUnsaved = false;
+	QMetaObject::invokeMethod(m_pDocument, "HasUnsavedChanges", Qt::DirectConnection, Q_RETURN_ARG(bool, bUnsaved));
+	return bUnsaved;
+}
+
 void VRetargetPanel::TellIgnored(const QString& i_rCommand, const QString& i_rReason)
 {
 	NVX_LOG("Command", NVX::ELogWarning, "%1% did nothing: %2%", i_rCommand.toStdString(), i_rReason.toStdString());

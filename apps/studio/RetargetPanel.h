@@ -36,6 +36,9 @@ public:
 	/// Saves the target subject to its file; the panel asks for one if there is none.
 	void Save();
 
+	/// The target subject would be lost.
+	bool HasUnsavedChanges() const;
+
 	QWidget* Widget() const { return m_pWidget; }
 
 	/// The panel's QML has been loaded.

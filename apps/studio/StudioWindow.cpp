@@ -16,6 +16,7 @@
 #include <QDockWidget>
 #include <QLabel>
 #include <QMenu>
+#include <QMessageBox>
 #include <QMimeData>
 #include <QStatusBar>
 
@@ -144,9 +145,30 @@ void VStudioWindow::ShowPreferences()
 
 void VStudioWindow::closeEvent(QCloseEvent* i_pEvent)
 {
+	if (!MayClose())
+		return i_pEvent->ignore();
 	m_rSettings.setValue(c_GeometryKey, saveGeometry());
 	m_rSettings.setValue(c_StateKey, saveState(c_LayoutVersion));
 	QMainWindow::closeEvent(i_pEvent);
+}
+
+bool VStudioWindow::MayClose()
+{
+	if (!m_pRetargetPanel || !m_pRetargetPanel->HasUnsavedChanges())
+		return true;
+	QMessageBox box(QMessageBox::Warning, windowTitle(), tr("The retarget subject has changes that are not saved."),
+	    QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, this);
+	Named(&box, "UnsavedChanges", box.text());
+	box.setDefaultButton(QMessageBox::Save);
+	switch (box.exec())
+	{
+	case QMessageBox::Discard: return true;
+	case QMessageBox::Save:
+		// Where it must ask for a file, or cannot write it, the window stays.
+		m_pRetargetPanel->Save();
+		return !m_pRetargetPanel->HasUnsavedChanges();
+	default: return false;
+	}
 }
 
 void VStudioWindow::dragEnterEvent(QDragEnterEvent* i_pEvent)

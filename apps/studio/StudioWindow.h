@@ -67,6 +67,9 @@ private:
 	void UpdateRecentFiles();
 	void ShowAbout();
 	void Say(const QString& i_rText);
+	/// Asks what is to become of changes that are not saved.
+	/// @return false if the window must stay.
+	bool MayClose();
 
 	QSettings& m_rSettings;
 	const std::shared_ptr<VQtDispatcher> m_pDispatcher;

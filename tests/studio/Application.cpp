@@ -1,6 +1,7 @@
 #include "studio/DarkStyle.h"
 
 #include <QApplication>
+#include <QQuickWindow>
 #include <gtest/gtest.h>
 
 #include <memory>
@@ -8,13 +9,15 @@
 namespace
 {
 
-/// One for all tests of the process, which ends before Qt's own statics do.
+/// One for all tests of the process, which ends before Qt's own statics do. Drawn without OpenGL, which is slow in
+/// software; runs of the program have it.
 class VApplication : public testing::Environment
 {
 public:
 	void SetUp() override
 	{
-		QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts);
+		qputenv("QT_XCB_GL_INTEGRATION", "none");
+		QQuickWindow::setSceneGraphBackend(QSGRendererInterface::Software);
 		m_pApplication = std::make_unique<QApplication>(m_Count, m_pArguments);
 		StudioHost::ApplyDarkStyle(*m_pApplication);
 	}

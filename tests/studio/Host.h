@@ -56,6 +56,13 @@ private:
 	const std::shared_ptr<void> m_pSink;
 };
 
+inline QByteArray ReadFile(const QString& i_rPath)
+{
+	QFile file(i_rPath);
+	EXPECT_TRUE(file.open(QIODevice::ReadOnly)) << i_rPath.toStdString();
+	return file.readAll();
+}
+
 inline QString WriteFile(const QString& i_rPath, const QByteArray& i_rBytes)
 {
 	QFile file(i_rPath);

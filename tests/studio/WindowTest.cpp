@@ -22,10 +22,12 @@
 #include <QLineEdit>
 #include <QMenu>
 #include <QMenuBar>
+#include <QMessageBox>
 #include <QMimeData>
 #include <QQuickItem>
 #include <QQuickWidget>
 #include <QTest>
+#include <QTimer>
 
 namespace
 {
@@ -194,6 +196,47 @@ TEST_F(Window, KeepsItsLayout)
 	EXPECT_FALSE(m_pWindow->findChild<QDockWidget*>("LogDock")->isVisible());
 	EXPECT_EQ(m_pWindow->size(), size);
 	EXPECT_TRUE(m_pWindow->RetargetPanel()->Widget()->isVisible());
+}
+
+TEST_F(Window, AsksBeforeUnsavedChangesAreLost)
+{
+	LoadPanel();
+	const QString target = Path("performer.qrr");
+	ASSERT_TRUE(QFile::copy(c_Source, target));
+	const QByteArray before = ReadFile(target);
+	ASSERT_TRUE(m_pWindow->Open(target));
+	EXPECT_TRUE(m_pWindow->close()) << "nothing has changed yet";
+
+	QObject* const pDocument = dynamic_cast<NVX::IQuickWidget*>(m_pWindow->RetargetPanel()->Widget())
+	                               ->contextProperty("ContextRetargetSetup")
+	                               .value<QObject*>();
+	m_pWindow->show();
+	QMetaObject::invokeMethod(pDocument, "RemoveUnnecessaryJoints");
+	const struct
+	{
+		QMessageBox::StandardButton m_Answer;
+		bool m_bCloses;
+		bool m_bSaves;
+	} rows[] = {
+	    {QMessageBox::Cancel, false, false}, {QMessageBox::Discard, true, false}, {QMessageBox::Save, true, true}};
+	for (const auto& rRow : rows)
+	{
+		m_pWindow->show();
+		bool bAsked = false;
+		QTimer::singleShot(0, m_pWindow.get(),
+		    [&]
+		    {
+			    auto* const pBox = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+			    ASSERT_TRUE(pBox);
+			    bAsked = true;
+			    pBox->button(rRow.m_Answer)->click();
+		    });
+		EXPECT_EQ(m_pWindow->close(), rRow.m_bCloses);
+		EXPECT_TRUE(bAsked);
+		EXPECT_EQ(ReadFile(target) != before, rRow.m_bSaves);
+	}
+	m_pWindow->show();
+	EXPECT_TRUE(m_pWindow->close()) << "all is saved";
 }
 
 TEST_F(Window, PreferencesHaveARowForEachFolder)

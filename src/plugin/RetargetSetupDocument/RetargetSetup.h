@@ -74,6 +74,9 @@ public:
 	/// Recalculates the offset of each target from the present bind poses.
 	Q_INVOKABLE void UpdateTargets();
 
+	/// True if the target subject is not what was last loaded or saved: closing would lose it.
+	Q_INVOKABLE bool HasUnsavedChanges() const;
+
 	bool JointSymmetry() const { return m_bJointSymmetry; }
 	void SetJointSymmetry(bool i_bJointSymmetry);
 
@@ -221,6 +224,9 @@ private:
 	[[maybe_unused]] bool m_bSpare = false;
 	bool m_bJointSymmetry = true;
 	NVX::VSignal<> m_ChangedSignal;
+
+	/// What the file held when it was last loaded or saved.
+	VSubjectValues m_SavedTarget;
 
 	std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pSourceFK;
 	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubjectOfSourceFK;

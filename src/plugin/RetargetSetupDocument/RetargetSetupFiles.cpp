@@ -224,6 +224,7 @@ std::uint32_t VRetargetSetup::LoadTargetSubject(const boost::filesystem::path& i
 		return NVX::Status::c_Failure;
 	m_TargetExtras = std::move(extras);
 	m_SourceName = std::move(sourceName);
+	m_SavedTarget = TargetValues();
 	return NVX::Status::c_Success;
 }
 
@@ -235,8 +236,21 @@ std::uint32_t VRetargetSetup::SaveTargetSubject(const boost::filesystem::path& i
 	TellNamesUsedTwice(*target.m_pParametrised);
 	if (!ReadsBack({*target.m_pParametrised, *target.m_pApplicationData}, m_TargetExtras))
 		return NVX::Status::c_WriteFailure;
-	return CoreOrlexQRTIO::VWriter().Write(i_rPath, *target.m_pParametrised, *target.m_pApplicationData, m_TargetExtras,
-	    CoreOrlexQRTIO::c_AutomaticVersion);
+	const std::uint32_t status = CoreOrlexQRTIO::VWriter().Write(i_rPath, *target.m_pParametrised,
+	    *target.m_pApplicationData, m_TargetExtras, CoreOrlexQRTIO::c_AutomaticVersion);
+	if (status == NVX::Status::c_Success)
+		m_SavedTarget = target;
+	return status;
+}
+
+bool VRetargetSetup::HasUnsavedChanges() const
+{
+	const auto differs = [](const auto& i_rpNow, const auto& i_rpSaved)
+	{ return i_rpNow != i_rpSaved && (!i_rpNow || !i_rpSaved || !(*i_rpNow == *i_rpSaved)); };
+	const VSubjectValues target = TargetValues();
+	return target.m_pParametrised
+	    && (differs(target.m_pParametrised, m_SavedTarget.m_pParametrised)
+	        || differs(target.m_pApplicationData, m_SavedTarget.m_pApplicationData));
 }
 
 void VRetargetSetup::LoadTargetSubjectURL(const QUrl& i_rFileURL)
