@@ -271,6 +271,24 @@ TEST_F(ParameterView, EnumerationFollowsItsParameter)
 	EXPECT_EQ(m_Page.Property("Source", "currentIndex"), 0);
 }
 
+TEST_F(ParameterView, NoValueIsTheEntryOfTheEmptyValue)
+{
+	VParameter& rSkin = Add<std::string>("Skin");
+	rSkin.SetEnumeration({{"(None)", ToVariant(std::string())}, {"A", ToVariant(std::string("/a.fbx"))}});
+	ASSERT_TRUE(Show());
+	EXPECT_EQ(m_Page.Property("Skin", "displayText"), "(None)");
+	Click("Skin");
+	Key(Qt::Key_Down);
+	Key(Qt::Key_Return);
+	EXPECT_EQ(rSkin.GetValueText(), "/a.fbx");
+	EXPECT_EQ(m_Page.Property("Skin", "displayText"), "A");
+	Click("Skin");
+	Key(Qt::Key_Up);
+	Key(Qt::Key_Return);
+	EXPECT_FALSE(rSkin.HasValue());
+	EXPECT_EQ(m_Page.Property("Skin", "displayText"), "(None)");
+}
+
 TEST_F(ParameterView, HiddenAdvancedAndCategories)
 {
 	const auto flag = [this](const char* i_pName, IParameter::EFlags i_Flag, bool i_bSet)

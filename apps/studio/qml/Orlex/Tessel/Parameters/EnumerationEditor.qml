@@ -8,7 +8,9 @@ Item {
 	id: editor
 
 	property var row
-	readonly property int chosen: row && row.parameter.currentEnumIndex !== undefined ? row.parameter.currentEnumIndex : -1
+	// No value is the entry of the empty value, where there is one: "(None)".
+	readonly property int chosen: !row ? -1 : row.parameter.currentEnumIndex >= 0 ? row.parameter.currentEnumIndex
+		: row.valueText === "" && row.parameter.enumTexts ? row.parameter.enumTexts.indexOf("") : -1
 	readonly property bool foreign: chosen < 0 && !!row && row.valueText !== ""
 
 	function follow() {
