@@ -1,5 +1,6 @@
 #include "CoreOrlexTypes/Subject.h"
 #include "CoreOrlexTypes/SubjectApplicationData.h"
+#include "CoreOrlexTypes/SubjectState.h"
 #include "Flow2TypesUtils/FlowParametersItem.h"
 #include "Flow2TypesUtils/ItemTypes.h"
 #include "Flow2TypesUtils/TaggedCoreTypeExtractor.h"
@@ -24,7 +25,7 @@ const struct
 	const char* m_pName;
 	const char* m_pText;
 	std::uint32_t m_Tag;
-	/// S subject, P parametrised, A application data, blank for bytes.
+	/// S subject, P parametrised, A application data, D pose, T settings, L labels, blank for bytes.
 	char m_Carries = ' ';
 } c_Rows[] = {
     {"FlowCameraHardware", "CameraHardware Item", 4096},
@@ -38,33 +39,33 @@ const struct
     {"FlowCentroidAssignmentSet", "CentroidAssignmentSet Item", 4108},
     {"FlowReconstructionSet", "ReconstructionSet Item", 4109},
     {"FlowReconstructionTrackSet", "ReconstructionTrackSet Item", 4110},
-    {"FlowReconstructionLabelSet", "ReconstructionLabelSet Item", 4111},
-    {"FlowSubjectDynamicParameters", "SubjectDynamicParameters Item", 4113},
+    {"FlowReconstructionLabelSet", "ReconstructionLabelSet Item", 4111, 'L'},
+    {"FlowSubjectDynamicParameters", "SubjectDynamicParameters Item", 4113, 'D'},
     {"FlowSubject", "Subject Item", 4114, 'S'},
     {"FlowSubjectApplicationData", "SubjectApplicationData Item", 4115, 'A'},
     {"FlowSubjectParametrised", "SubjectParametrised Item", 4122, 'P'},
     {"FlowSubjectForSolving", "Subject Item", 4123, 'S'},
     {"FlowSubjectApplicationDataForSolving", "SubjectApplicationData Item", 4124, 'A'},
-    {"FlowSubjectDynamicParametersForSolving", "SubjectDynamicParameters Item", 4125},
+    {"FlowSubjectDynamicParametersForSolving", "SubjectDynamicParameters Item", 4125, 'D'},
     {"FlowReconstructionSetForSolving", "ReconstructionSet Item", 4126},
-    {"FlowReconstructionLabelSetForSolving", "ReconstructionLabelSet Item", 4127},
+    {"FlowReconstructionLabelSetForSolving", "ReconstructionLabelSet Item", 4127, 'L'},
     {"FlowCentroidLabelSet", "CentroidLabelSet Item", 4130},
     {"FlowDevice", "Device Item", 4131},
     {"FlowDeviceApplicationData", "DeviceApplicationData Item", 4132},
     {"FlowDeviceSamples", "DeviceSamples Item", 4133},
-    {"FlowSubjectSettings", "SubjectSettings Item", 4135},
+    {"FlowSubjectSettings", "SubjectSettings Item", 4135, 'T'},
     {"FlowSubjectTemplate", "Uncalibrated subject template item", 4138, 'P'},
     {"FlowSubjectParametrisedForSolving", "SubjectParametrised for second solve item", 4140, 'P'},
     {"FlowCameraPhysicalSensorData", "CameraPhysicalSensorData Item", 4142},
     {"FlowSubjectTemplateForSolving", "Uncalibrated solving subject template item", 4144, 'P'},
     {"FlowVolumeProperties", "VolumeProperties Item", 4145},
     {"FlowLabelledRotationSet", "LabelledRotationSet Item", 4147},
-    {"FlowRigidObjectDynamicParameters", "RigidObjectDynamicParameters Item", 4148},
+    {"FlowRigidObjectDynamicParameters", "RigidObjectDynamicParameters Item", 4148, 'D'},
     {"FlowRigidObject", "Rigid Object Item", 4149, 'S'},
     {"FlowRigidObjectApplicationData", "RigidObjectApplicationData Item", 4150, 'A'},
     {"FlowSubjectForRetargeting", "SubjectForRetargeting Item", 4152, 'S'},
     {"FlowSubjectApplicationDataForRetargeting", "SubjectApplicationDataForRetargeting Item", 4153, 'A'},
-    {"FlowSubjectDynamicParametersForRetargeting", "SubjectDynamicParametersForRetargeting Item", 4154},
+    {"FlowSubjectDynamicParametersForRetargeting", "SubjectDynamicParametersForRetargeting Item", 4154, 'D'},
     {"FlowSubjectTemplateForRetargeting", "Uncalibrated retargeting subject template item", 4156, 'P'},
     {"FlowLabelledRotationSetForSolving", "LabelledRotationSetForSolving Item", 4160},
     {"FlowSmartObject", "Smart Object Item", 4164},
@@ -106,6 +107,9 @@ TEST(ItemCatalogue, Rows)
 		EXPECT_EQ(Passes<VSubject>(rRow.m_pName, rRow.m_Tag), rRow.m_Carries == 'S');
 		EXPECT_EQ(Passes<VSubjectParametrised>(rRow.m_pName, rRow.m_Tag), rRow.m_Carries == 'P');
 		EXPECT_EQ(Passes<VSubjectApplicationData>(rRow.m_pName, rRow.m_Tag), rRow.m_Carries == 'A');
+		EXPECT_EQ(Passes<CoreOrlexTypes::VSubjectDynamicParameters>(rRow.m_pName, rRow.m_Tag), rRow.m_Carries == 'D');
+		EXPECT_EQ(Passes<CoreOrlexTypes::VSubjectSettings>(rRow.m_pName, rRow.m_Tag), rRow.m_Carries == 'T');
+		EXPECT_EQ(Passes<CoreOrlexTypes::VReconstructionLabelSet>(rRow.m_pName, rRow.m_Tag), rRow.m_Carries == 'L');
 		EXPECT_EQ(Passes<VItemBytes>(rRow.m_pName, rRow.m_Tag), rRow.m_Carries == ' ');
 	}
 }

@@ -14,6 +14,9 @@ enum class EItemValue
 	ESubject,
 	ESubjectParametrised,
 	ESubjectApplicationData,
+	ESubjectDynamicParameters,
+	ESubjectSettings,
+	EReconstructionLabelSet,
 	/// Types of the host's other panels, whose bytes are passed on unread.
 	EBytes
 };

@@ -9,9 +9,12 @@
 
 namespace CoreOrlexTypes
 {
+struct VReconstructionLabelSet;
 struct VSubject;
 struct VSubjectApplicationData;
+struct VSubjectDynamicParameters;
 struct VSubjectParametrised;
+struct VSubjectSettings;
 } // namespace CoreOrlexTypes
 
 namespace Flow2TypesUtils
@@ -31,6 +34,11 @@ decltype(auto) VisitItemType(EItemValue i_Value, TFunction&& i_Function)
 		return i_Function(std::type_identity<CoreOrlexTypes::VSubjectParametrised>());
 	case EItemValue::ESubjectApplicationData:
 		return i_Function(std::type_identity<CoreOrlexTypes::VSubjectApplicationData>());
+	case EItemValue::ESubjectDynamicParameters:
+		return i_Function(std::type_identity<CoreOrlexTypes::VSubjectDynamicParameters>());
+	case EItemValue::ESubjectSettings: return i_Function(std::type_identity<CoreOrlexTypes::VSubjectSettings>());
+	case EItemValue::EReconstructionLabelSet:
+		return i_Function(std::type_identity<CoreOrlexTypes::VReconstructionLabelSet>());
 	case EItemValue::EBytes: break;
 	}
 	return i_Function(std::type_identity<VItemBytes>());

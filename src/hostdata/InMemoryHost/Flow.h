@@ -26,7 +26,7 @@ private:
 	std::shared_ptr<const T> m_pValue;
 };
 
-/// Knows the flow types of the item catalogue, items of parameters, and what is registered.
+/// Knows the flow types of the item catalogue, items of parameters and of the scene, and what is registered.
 class VItemFactory : public NVX::VCounted<TesselPluginInterface::IItemFactory>
 {
 public:
@@ -50,6 +50,7 @@ class VFlowFrame : public NVX::VCounted<TesselPluginInterface::IFlowFrame>
 public:
 	void AddItem(const NVX::CountedPointer<TesselPluginInterface::IFlowItem>& i_rpItem) override;
 	NVX::CountedPointer<TesselPluginInterface::IFlowItem> Item(const std::string& i_rFlowType) const override;
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> Copy() const override;
 
 	/// In the order in which they were added.
 	const std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>>& Items() const { return m_Items; }

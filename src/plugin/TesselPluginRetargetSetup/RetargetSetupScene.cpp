@@ -1,5 +1,7 @@
 #include "TesselPluginRetargetSetup/RetargetSetupScene.h"
 
+#include "Flow2Graphics/FlowSubjectSceneTransform.h"
+#include "Flow2TypesUtils/ParameterSet.h"
 #include "OrlexGraphics/SkinCache.h"
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
@@ -13,6 +15,9 @@ using NVX::ISelectionItem;
 
 namespace
 {
+
+/// Among the pose indices of VFlowSubjectSceneTransform.
+constexpr std::uint32_t c_BindPose = 6;
 
 ISelectionItem TargetSegment(std::size_t i_Index)
 {
@@ -36,6 +41,15 @@ VRetargetSetupScene::~VRetargetSetupScene() = default;
 
 void VRetargetSetupScene::OnShared()
 {
+	auto pPose = std::make_unique<Flow2Utils::VParameterTyped<std::uint32_t>>("PoseIndex");
+	pPose->Set(c_BindPose);
+	const auto pParameters = std::make_shared<Flow2Utils::VParameterSet>();
+	pParameters->Add(std::move(pPose));
+	m_pSubjectTransform = std::make_shared<Flow2Graphics::VFlowSubjectSceneTransform>(m_pItemFactory);
+	// Source and target stand in one world: what the eye sees is what offsets are measured from.
+	m_pSubjectTransform->SetMode(0);
+	m_pSubjectTransform->SetParameters(pParameters);
+
 	const auto onSelectionChanged = WeakBind(&VRetargetSetupScene::OnSelectionChanged);
 	SelectionManager()->Selection().ChangedSignal().Connect(onSelectionChanged, Dispatcher());
 	SelectionManager()->PreSelection().ChangedSignal().Connect(onSelectionChanged, Dispatcher());
@@ -51,8 +65,12 @@ void VRetargetSetupScene::OnSetupChanged()
 
 void VRetargetSetupScene::RefreshScene()
 {
-	if (const auto pFrame = m_pRetargetSetup->GetCurrentFrame())
-		SetFrame(pFrame);
+	const auto pFrame = m_pRetargetSetup->GetCurrentFrame();
+	if (!pFrame)
+		return;
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pPosed;
+	m_pSubjectTransform->Transform(pPosed, pFrame, 0);
+	SetFrame(pPosed);
 }
 
 std::int64_t VRetargetSetupScene::GetSelectedTargetSegment(std::vector<ISelectionItem>& o_rSelection) const

@@ -13,6 +13,11 @@
 
 class VRetargetSetup;
 
+namespace Flow2Graphics
+{
+class VFlowSubjectSceneTransform;
+}
+
 /// The preview of the panel: both subjects of the document in their bind poses, and the manipulator that poses the
 /// target subject. Made by NVX::MakeShared; follows document, skins and selection from then on. User interface thread
 /// only, but for what VFlowScene names as the render thread's.
@@ -53,6 +58,8 @@ private:
 
 	const std::shared_ptr<VRetargetSetup> m_pRetargetSetup;
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
+	/// Makes what is shown of the document's frames.
+	std::shared_ptr<Flow2Graphics::VFlowSubjectSceneTransform> m_pSubjectTransform;
 	/// Where the manipulator stood when its segment was selected.
 	QMatrix4x4 m_ManipulatorOrigin;
 };

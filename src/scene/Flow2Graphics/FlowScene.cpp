@@ -1,20 +1,57 @@
 #include "Flow2Graphics/FlowScene.h"
 
+#include "Flow2Graphics/FlowRenderFloorGrid.h"
+#include "Flow2Graphics/FlowRenderSubjects.h"
 #include "OrlexGraphics/RenderAxis.h"
 #include "OrlexGraphics/RenderFloorGrid.h"
 #include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/RenderOutlines.h"
 #include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/SkinCache.h"
+
+#include <QPointer>
 
 namespace Flow2Graphics
 {
 
-VFlowScene::~VFlowScene() = default;
+VFlowScene::VFlowScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pShaderLibrary,
+    std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager,
+    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache,
+    std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher, bool i_bAllowHiddenPick)
+    : VOrlexScene(std::move(i_pShaderLibrary), std::move(i_pSelectionManager), std::move(i_pSkinCache),
+        std::move(i_pDispatcher), i_bAllowHiddenPick),
+      m_UpAxis(Flow2TypesUtils::FlowUpAxisItem::c_pName)
+{
+	if (SkinCache())
+		m_SkinConnection = SkinCache()->ChangedSignal().Connect(
+		    [pScene = QPointer<VFlowScene>(this)]
+		    {
+			    if (!pScene)
+				    throw NVX::VDeregisterWeakCallbackException();
+			    if (pScene->m_pDynamics)
+				    pScene->m_pDynamics->SetRebind();
+		    },
+		    Dispatcher());
+}
+
+VFlowScene::~VFlowScene()
+{
+	m_SkinConnection.Disconnect();
+}
 
 void VFlowScene::SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame)
 {
 	m_pPendingFrame = std::move(i_pFrame);
 	RequestRefresh();
+}
+
+template <typename TFlowType, typename TPartner, typename... TArguments>
+std::shared_ptr<TFlowType> VFlowScene::AddFlowType(std::shared_ptr<TPartner> i_pPartner, TArguments&&... i_rArguments)
+{
+	m_RenderList.push_back(i_pPartner);
+	auto pType = std::make_shared<TFlowType>(std::move(i_pPartner), std::forward<TArguments>(i_rArguments)...);
+	m_FlowTypes.push_back(pType);
+	return pType;
 }
 
 void VFlowScene::InitialiseGL()
@@ -23,13 +60,28 @@ void VFlowScene::InitialiseGL()
 	if (m_pRenderManipulator)
 		return;
 	// In the order of drawing.
-	m_RenderList.push_back(std::make_shared<OrlexGraphics::VRenderFloorGrid>(*m_pShaderLibrary));
+	AddFlowType<VFlowRenderFloorGrid>(std::make_shared<OrlexGraphics::VRenderFloorGrid>(*m_pShaderLibrary));
+	AddSubjects();
 	m_pRenderManipulator =
 	    std::make_shared<OrlexGraphics::VRenderManipulator>(*m_pShaderLibrary, m_pRegistry, SelectionManager());
 	m_pManipulator = m_pRenderManipulator;
 	m_RenderList.push_back(m_pRenderManipulator);
 	m_RenderList.push_back(std::make_shared<OrlexGraphics::VRenderAxis>(*m_pShaderLibrary));
 	m_PostList.push_back(std::make_shared<OrlexGraphics::VRenderOutlines>(*m_pShaderLibrary, m_pRegistry));
+}
+
+void VFlowScene::AddSubjects()
+{
+	const auto markers = [this](bool i_bSolving)
+	{
+		return AddFlowType<VFlowRenderSubjectMarkers>(
+		    std::make_shared<VRenderSubjectMarkers>(*m_pShaderLibrary, SphereHelper(), i_bSolving));
+	};
+	const auto pMarkers = markers(false);
+	const auto pMarkersForSolving = markers(true);
+	m_pDynamics = AddFlowType<VFlowRenderSubjectDynamics>(
+	    std::make_shared<VRenderSubjectDynamics>(*m_pShaderLibrary, m_pRegistry, SphereHelper()), pMarkers,
+	    pMarkersForSolving);
 }
 
 bool VFlowScene::Synchronise()
@@ -45,7 +97,26 @@ void VFlowScene::Refresh()
 	Registry().Reset();
 	if (m_pRenderManipulator)
 		m_pRenderManipulator->AllocateIds();
+	if (m_pFrame)
+		OnFrame();
 	VOrlexScene::Refresh();
+}
+
+void VFlowScene::OnFrame()
+{
+	if (m_UpAxis.Update(*m_pFrame) && m_UpAxis.Value())
+		m_bFrameYUp = m_UpAxis.Value()->m_Axis == Flow2TypesUtils::FlowUpAxisItem::c_Y;
+	VFlowContext context{Registry(), SkinCache().get(), m_bFrameYUp};
+	for (const std::shared_ptr<IFlowRenderType>& rpType : m_FlowTypes)
+	{
+		rpType->UpdateStatic(*m_pFrame);
+		rpType->Update(*m_pFrame, context);
+	}
+	if (m_pDynamics)
+	{
+		m_Overlay.m_SubjectLabels = m_pDynamics->Labels(false, m_bFrameYUp);
+		m_Overlay.m_PropLabels = m_pDynamics->Labels(true, m_bFrameYUp);
+	}
 }
 
 std::vector<QVector4D> VFlowScene::GetBounds(const std::vector<NVX::ISelectionItem>& i_rSelection) const

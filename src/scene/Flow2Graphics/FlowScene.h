@@ -1,5 +1,7 @@
 #pragma once
 
+#include "Flow2TypesUtils/ItemCache.h"
+#include "Flow2TypesUtils/SceneItems.h"
 #include "NVX/CountedPointer.h"
 #include "OrlexGraphics/OrlexScene.h"
 #include "TesselPluginInterface/IFlowFrame.h"
@@ -12,13 +14,20 @@ class VRenderManipulator;
 namespace Flow2Graphics
 {
 
+class IFlowRenderType;
+class VFlowRenderSubjectDynamics;
+
 /// A scene that gets its content from the host's frames.
 class VFlowScene : public OrlexGraphics::VOrlexScene
 {
 	Q_OBJECT
 
 public:
-	using VOrlexScene::VOrlexScene;
+	/// As VOrlexScene.
+	VFlowScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pShaderLibrary,
+	    std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager,
+	    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache,
+	    std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher, bool i_bAllowHiddenPick);
 	~VFlowScene() override;
 
 	/// Null before the first frame.
@@ -39,7 +48,17 @@ public:
 	    const std::vector<std::uint32_t>& i_rIds, std::vector<std::string>& o_rNames) const override;
 
 private:
+	void AddSubjects();
+	template <typename TFlowType, typename TPartner, typename... TArguments>
+	std::shared_ptr<TFlowType> AddFlowType(std::shared_ptr<TPartner> i_pPartner, TArguments&&... i_rArguments);
+	void OnFrame();
+
 	std::shared_ptr<OrlexGraphics::VRenderManipulator> m_pRenderManipulator;
+	/// In the order in which they were made.
+	std::vector<std::shared_ptr<IFlowRenderType>> m_FlowTypes;
+	std::shared_ptr<VFlowRenderSubjectDynamics> m_pDynamics;
+	Flow2TypesUtils::VItemCacheTyped<Flow2TypesUtils::FlowUpAxisItem> m_UpAxis;
+	NVX::VConnection m_SkinConnection;
 	/// Of the user interface thread.
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pPendingFrame;
 	/// Of the render thread.

@@ -36,6 +36,7 @@ void VSelectionRegistry::Reset()
 	m_NextId = 1;
 	m_Excluded.clear();
 	m_BoundsById.clear();
+	m_PickBounds.clear();
 	m_bFlagged = false;
 	// Others may still read those of the frame before.
 	m_pPlaces = std::make_shared<VItemPlaces>();
@@ -159,7 +160,10 @@ void VSelectionRegistry::ExcludeOutside(const VPickFrustum& i_rFrustum)
 	if (m_BoundsById.empty())
 		for (const auto& [rItem, rBound] : m_pPlaces->m_Bounds)
 			if (const auto id = m_Ids.find(rItem); id != m_Ids.end())
-				m_BoundsById.emplace_back(id->second, rBound);
+			{
+				const auto pick = m_PickBounds.find(rItem);
+				m_BoundsById.emplace_back(id->second, pick == m_PickBounds.end() ? rBound : pick->second);
+			}
 	for (const auto& [id, rBound] : m_BoundsById)
 		if (!i_rFrustum.Contains(rBound))
 			Exclude(id);

@@ -61,8 +61,14 @@ public:
 	/// Empty if the item was given none.
 	const std::string& GetName(std::uint32_t i_Id) const;
 
-	/// @param i_rBound encloses all that is drawn under the item's id: a pick elsewhere does not draw it.
+	/// @param i_rBound what a view that is to show the item has to show. A pick elsewhere does not draw the item,
+	/// unless it has a pick bound.
 	void SetItemBound(const NVX::ISelectionItem& i_rItem, const QVector4D& i_rBound);
+	/// @param i_rBound encloses all that is drawn under the item's id, where that reaches beyond the item's bound.
+	void SetPickBound(const NVX::ISelectionItem& i_rItem, const QVector4D& i_rBound)
+	{
+		m_PickBounds[i_rItem] = i_rBound;
+	}
 	void SetItemMatrix(const NVX::ISelectionItem& i_rItem, const QMatrix4x4& i_rMatrix);
 	/// Null if the item has none in this frame.
 	const QVector4D* GetItemBound(const NVX::ISelectionItem& i_rItem) const;
@@ -93,6 +99,7 @@ private:
 	std::vector<NVX::ISelectionItem> m_Preselected;
 	/// By id.
 	std::vector<bool> m_Excluded;
+	std::unordered_map<NVX::ISelectionItem, QVector4D, VSelectionItemHash> m_PickBounds;
 	/// The bounds by id, once a pick has asked for them.
 	std::vector<std::pair<std::uint32_t, QVector4D>> m_BoundsById;
 	bool m_bFlagged = false;

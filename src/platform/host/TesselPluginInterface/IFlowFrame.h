@@ -14,6 +14,9 @@ public:
 
 	/// The item of this flow type that was added last, null if there is none.
 	virtual NVX::CountedPointer<IFlowItem> Item(const std::string& i_rFlowType) const = 0;
+
+	/// Another frame with the same items, for its maker to add to.
+	virtual NVX::CountedPointer<IFlowFrame> Copy() const = 0;
 };
 
 class IFrameFactory : public NVX::ICounted

@@ -1,0 +1,295 @@
+#include "Flow2Graphics/RenderSubjectDynamics.h"
+
+#include "CoreGraphics/RenderContext.h"
+#include "CoreGraphics/ShaderLibrary.h"
+#include "Flow2Graphics/SubjectShapes.h"
+#include "OrlexGraphics/MeshFile.h"
+#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/SphereHelper.h"
+
+#include <qopengl.h>
+
+using CoreGraphics::VRenderState;
+
+namespace Flow2Graphics
+{
+
+namespace
+{
+
+constexpr float c_AxesLength = 100.0f;
+constexpr float c_ArrowWidth = 5.0f;
+/// Of the shaft, and of the head.
+constexpr float c_ArrowLength = 50.0f;
+const QVector4D c_CovarianceColour(0.5f, 0.5f, 0.5f, 0.5f);
+const std::array<QVector4D, 3> c_AxisColours{
+    QVector4D(1.0f, 0.2f, 0.2f, 1.0f), QVector4D(0.2f, 1.0f, 0.2f, 1.0f), QVector4D(0.2f, 0.2f, 1.0f, 1.0f)};
+
+VRenderState Solid()
+{
+	VRenderState state;
+	state.m_Cull = CoreGraphics::ECullBack;
+	state.m_bDepthTest = true;
+	return state;
+}
+
+VRenderState Blended()
+{
+	VRenderState state = Solid();
+	state.m_ColourBlend = CoreGraphics::EColourBlendAlpha;
+	return state;
+}
+
+/// What is behind is not hidden.
+VRenderState Fading()
+{
+	VRenderState state = Blended();
+	state.m_bDepthWrite = false;
+	return state;
+}
+
+VRenderState Lines()
+{
+	VRenderState state;
+	state.m_bDepthTest = true;
+	return state;
+}
+
+std::array<std::array<QMatrix4x4, 2>, 3> MakeArrowParts()
+{
+	std::array<std::array<QMatrix4x4, 2>, 3> parts;
+	parts[0][0].rotate(90.0f, 0.0f, 1.0f, 0.0f);
+	parts[1][0].rotate(-90.0f, 1.0f, 0.0f, 0.0f);
+	for (auto& [rShaft, rHead] : parts)
+	{
+		rHead = rShaft;
+		rShaft.scale(c_ArrowWidth, c_ArrowWidth, c_ArrowLength);
+		rHead.translate(0.0f, 0.0f, c_ArrowLength);
+		rHead.scale(c_ArrowWidth, c_ArrowWidth, c_ArrowLength);
+	}
+	return parts;
+}
+
+} // namespace
+
+const OrlexGraphics::VSubjectOptions& SubjectOptions(
+    const OrlexGraphics::VSceneOptions& i_rOptions, ESubjectClass i_Class)
+{
+	switch (i_Class)
+	{
+	case ESubjectClassLabelling: return i_rOptions.m_LabellingSubject;
+	case ESubjectClassSolving: return i_rOptions.m_SolvingSubject;
+	case ESubjectClassRetargeting: return i_rOptions.m_RetargetingSubject;
+	default: return i_rOptions.m_PropSubject;
+	}
+}
+
+VRenderSubjectDynamics::VStep::VStep(CoreGraphics::VShaderLibrary& io_rLibrary, const std::string& i_rVertex,
+    const std::string& i_rFragment, const VRenderState& i_rState, const char* i_pPlace, const char* i_pColour)
+    : m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, i_rVertex, i_rFragment)), m_State(i_rState),
+      m_SelectionState(CoreGraphics::MakeSelectionState(i_rState)), m_Place(i_pPlace), m_Colour(i_pColour)
+{
+}
+
+VRenderSubjectDynamics::VRenderSubjectDynamics(CoreGraphics::VShaderLibrary& io_rLibrary,
+    std::shared_ptr<const OrlexGraphics::VSelectionRegistry> i_pRegistry,
+    std::shared_ptr<OrlexGraphics::VSphereHelper> i_pSphereHelper)
+    : m_pRegistry(std::move(i_pRegistry)), m_pSphereHelper(std::move(i_pSphereHelper)),
+      m_SolidBox(CoreGraphics::MakeBox(false)), m_WireBox(CoreGraphics::MakeBox(true)),
+      m_Cylinder(CoreGraphics::MakeCylinder(16, true)), m_Cone(CoreGraphics::MakeCone(16, true)),
+      m_Sphere(CoreGraphics::MakeSphere(2)), m_AxesLines(CoreGraphics::MakeAxes(c_AxesLength)),
+      m_Bone(OrlexGraphics::ReadMeshFile(io_rLibrary, "tetra_stripe.fbx")),
+      m_PositionTargets(io_rLibrary, "Target", "Colour", Blended(), "u_TargetPosAndSize", "u_ModelColour"),
+      m_Covariances(io_rLibrary, "NonUniformSphere", "Covariance", Blended(), "u_ModelTransform", "u_ModelColour"),
+      m_Boxes(io_rLibrary, "Simple3DModelColour", "SimpleLighting", Blended(), "u_ModelTransform", "u_ModelColour"),
+      m_Bones(io_rLibrary, "Segment", "Segment", Solid(), "u_ModelTransform", "u_SegmentColour"),
+      m_TranslucentBones(io_rLibrary, "Segment", "Segment", Blended(), "u_ModelTransform", "u_SegmentColour"),
+      m_Arrows(io_rLibrary, "Simple3DModelColour", "SimpleLighting", Solid(), "u_ModelTransform", "u_ModelColour"),
+      m_MissingMarkers(io_rLibrary, "MissingMarker", "MissingMarker", Fading(), "u_ReconPosAndSize", "u_ModelColour"),
+      m_Axes(io_rLibrary, "Simple3DModelWireframe", "Colour", Lines(), "u_ModelTransform", "u_ModelColour"),
+      m_ArrowParts(MakeArrowParts())
+{
+}
+
+VRenderSubjectDynamics::~VRenderSubjectDynamics() = default;
+
+void VRenderSubjectDynamics::Render(
+    CoreGraphics::VRenderContext& io_rContext, const OrlexGraphics::VSceneOptions& i_rOptions, std::uint32_t i_Pass)
+{
+	if (i_Pass == OrlexGraphics::EPassOverlay)
+		return;
+	// A source and a target skeleton stand together.
+	const bool bDual = i_rOptions.m_LabellingSubject.m_bEnabled && i_rOptions.m_LabellingSubject.m_bBones
+	    && i_rOptions.m_SolvingSubject.m_bEnabled && i_rOptions.m_SolvingSubject.m_bBones;
+	for (const VSubjectTypes& rTypes : c_SubjectTypes)
+	{
+		const OrlexGraphics::VSubjectOptions& rOptions = SubjectOptions(i_rOptions, rTypes.m_Class);
+		if (rOptions.m_bEnabled && !m_Lists[rTypes.m_Class].empty())
+			RenderList({io_rContext, m_Lists[rTypes.m_Class], rOptions, i_Pass, bDual,
+			    io_rContext.m_Mode != CoreGraphics::ERenderNormal});
+	}
+}
+
+void VRenderSubjectDynamics::RenderList(const VWalk& i_rWalk)
+{
+	const bool bTransparent = i_rWalk.m_Pass == OrlexGraphics::EPassTransparent;
+	const bool bDecoration = bTransparent && !i_rWalk.m_bPick;
+	if (i_rWalk.m_rOptions.m_bTargets && !bTransparent)
+		RenderPositionTargets(i_rWalk);
+	if (i_rWalk.m_rOptions.m_bTargetCovariances && bDecoration)
+		RenderCovariances(i_rWalk);
+	RenderBoxes(i_rWalk);
+	if (i_rWalk.m_rOptions.m_bBones && !(i_rWalk.m_bPick && bTransparent))
+	{
+		RenderBones(i_rWalk);
+		RenderSpheres(i_rWalk, &VRenderSubjectData::m_BoneSpheres, 0);
+	}
+	if (i_rWalk.m_rOptions.m_bTargets && !bTransparent)
+		RenderRotationTargets(i_rWalk);
+	if (i_rWalk.m_rOptions.m_bJoints && !bTransparent)
+		RenderSpheres(i_rWalk, &VRenderSubjectData::m_Joints, 3);
+	if (i_rWalk.m_rOptions.m_bMissingMarkers && bDecoration)
+		RenderMissingMarkers(i_rWalk);
+	if (i_rWalk.m_rOptions.m_bAxes && bDecoration)
+		RenderAxes(i_rWalk);
+}
+
+bool VRenderSubjectDynamics::Begin(const VWalk& i_rWalk, VStep& io_rStep, CoreGraphics::VShape& io_rShape)
+{
+	if (!i_rWalk.m_rContext.UseProgram(io_rStep.m_Program.Get(i_rWalk.m_bPick)))
+		return false;
+	i_rWalk.m_rContext.ApplyState(i_rWalk.m_bPick ? io_rStep.m_SelectionState : io_rStep.m_State);
+	i_rWalk.m_rContext.BindVertices(io_rShape.m_Vertices);
+	return true;
+}
+
+template <typename TPlace>
+bool VRenderSubjectDynamics::Place(const VWalk& i_rWalk, VStep& io_rStep, const TPlace& i_rPlace,
+    const QVector4D& i_rColour, const CoreGraphics::VSelectionId& i_rId)
+{
+	if (i_rWalk.m_bPick)
+	{
+		if (i_rId.m_Id == 0 || m_pRegistry->IsHidden(i_rId, i_rWalk.m_rContext.m_Mode))
+			return false;
+		io_rStep.m_Program.SetId(i_rWalk.m_rContext, i_rId);
+	}
+	else
+		i_rWalk.m_rContext.SetUniform(io_rStep.m_Colour, i_rColour);
+	i_rWalk.m_rContext.SetUniform(io_rStep.m_Place, i_rPlace);
+	return true;
+}
+
+void VRenderSubjectDynamics::RenderPositionTargets(const VWalk& i_rWalk)
+{
+	if (!Begin(i_rWalk, m_PositionTargets, m_WireBox))
+		return;
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+		for (const VRenderSubjectData::VShape& rTarget : rpSubject->m_PositionTargets)
+		{
+			if (!Place(i_rWalk, m_PositionTargets, rTarget.m_PositionAndSize, rTarget.m_Colour, rTarget.m_Id))
+				continue;
+			i_rWalk.m_rContext.DrawElements(GL_LINES, m_WireBox.m_Indices);
+			m_pSphereHelper->AddPickPoint(i_rWalk.m_rContext, rTarget.m_PositionAndSize.toVector3D(), rTarget.m_Id);
+		}
+}
+
+void VRenderSubjectDynamics::RenderCovariances(const VWalk& i_rWalk)
+{
+	if (!Begin(i_rWalk, m_Covariances, m_Sphere))
+		return;
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+		for (const QMatrix4x4& rCovariance : rpSubject->m_Covariances)
+		{
+			Place(i_rWalk, m_Covariances, rCovariance, c_CovarianceColour, {});
+			i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, m_Sphere.m_Indices);
+		}
+}
+
+void VRenderSubjectDynamics::RenderBoxes(const VWalk& i_rWalk)
+{
+	const bool bTransparent = i_rWalk.m_Pass == OrlexGraphics::EPassTransparent;
+	if ((i_rWalk.m_bPick && bTransparent) || !Begin(i_rWalk, m_Boxes, m_SolidBox))
+		return;
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+		for (const VRenderSubjectData::VModel& rBox : rpSubject->m_Boxes)
+		{
+			if (!i_rWalk.m_bPick && bTransparent != (rBox.m_Colour.w() != 1.0f))
+				continue;
+			if (!Place(i_rWalk, m_Boxes, rBox.m_Matrix, rBox.m_Colour, rBox.m_Id))
+				continue;
+			i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, m_SolidBox.m_Indices);
+			m_pSphereHelper->AddPickPoint(i_rWalk.m_rContext, Translation(rBox.m_Matrix), rBox.m_Id);
+		}
+}
+
+void VRenderSubjectDynamics::RenderBones(const VWalk& i_rWalk)
+{
+	VStep& rStep = i_rWalk.m_bDual ? m_TranslucentBones : m_Bones;
+	if (!m_Bone || !Begin(i_rWalk, rStep, *m_Bone))
+		return;
+	const bool bTransparent = i_rWalk.m_Pass == OrlexGraphics::EPassTransparent;
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+		for (const VRenderSubjectData::VModel& rBone : rpSubject->m_Bones)
+		{
+			const bool bTranslucent = i_rWalk.m_bDual && rBone.m_Colour.w() < 1.0f;
+			if (!i_rWalk.m_bPick && bTransparent != bTranslucent)
+				continue;
+			if (Place(i_rWalk, rStep, rBone.m_Matrix, rBone.m_Colour, rBone.m_Id))
+				i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, m_Bone->m_Indices);
+		}
+}
+
+void VRenderSubjectDynamics::RenderSpheres(const VWalk& i_rWalk,
+    std::vector<VRenderSubjectData::VShape> VRenderSubjectData::*i_pSpheres, std::uint32_t i_LevelCap)
+{
+	m_pSphereHelper->Begin(i_rWalk.m_rContext);
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+		for (const VRenderSubjectData::VShape& rSphere : (*rpSubject).*i_pSpheres)
+			m_pSphereHelper->Draw(
+			    i_rWalk.m_rContext, rSphere.m_PositionAndSize, rSphere.m_Id, rSphere.m_Colour, i_LevelCap);
+	m_pSphereHelper->End(i_rWalk.m_rContext);
+}
+
+void VRenderSubjectDynamics::RenderRotationTargets(const VWalk& i_rWalk)
+{
+	// The shaft shows where the target is, the head where the segment is.
+	for (const std::size_t part : {0u, 1u})
+	{
+		CoreGraphics::VShape& rShape = part == 0 ? m_Cylinder : m_Cone;
+		if (!Begin(i_rWalk, m_Arrows, rShape))
+			return;
+		for (const auto& rpSubject : i_rWalk.m_rSubjects)
+			for (const VRenderSubjectData::VRotationTarget& rTarget : rpSubject->m_RotationTargets)
+				for (std::size_t axis = 0; axis < m_ArrowParts.size(); ++axis)
+					if (Place(i_rWalk, m_Arrows,
+					        (part == 0 ? rTarget.m_Target : rTarget.m_Segment) * m_ArrowParts[axis][part],
+					        c_AxisColours[axis], rTarget.m_Id))
+						i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, rShape.m_Indices);
+	}
+}
+
+void VRenderSubjectDynamics::RenderMissingMarkers(const VWalk& i_rWalk)
+{
+	if (!Begin(i_rWalk, m_MissingMarkers, m_Sphere))
+		return;
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+		for (const VRenderSubjectData::VShape& rMarker : rpSubject->m_MissingMarkers)
+		{
+			Place(i_rWalk, m_MissingMarkers, rMarker.m_PositionAndSize, rMarker.m_Colour, rMarker.m_Id);
+			i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, m_Sphere.m_Indices);
+		}
+}
+
+void VRenderSubjectDynamics::RenderAxes(const VWalk& i_rWalk)
+{
+	if (!Begin(i_rWalk, m_Axes, m_AxesLines))
+		return;
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+		for (const QMatrix4x4& rMatrix : rpSubject->m_Axes)
+		{
+			Place(i_rWalk, m_Axes, rMatrix, {}, {});
+			i_rWalk.m_rContext.DrawElements(GL_LINES, m_AxesLines.m_Indices);
+		}
+}
+
+} // namespace Flow2Graphics

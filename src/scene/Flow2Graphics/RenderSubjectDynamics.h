@@ -1,0 +1,125 @@
+#pragma once
+
+#include "CoreGraphics/RenderState.h"
+#include "CoreGraphics/SelectableProgram.h"
+#include "CoreGraphics/Shapes.h"
+#include "CoreGraphics/Uniform.h"
+#include "Flow2Graphics/RenderSubjectData.h"
+#include "Flow2Graphics/SubjectTypes.h"
+#include "OrlexGraphics/IRenderType.h"
+#include "OrlexGraphics/SceneOptions.h"
+
+#include <array>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace CoreGraphics
+{
+class VShaderLibrary;
+class VShaderProgram;
+} // namespace CoreGraphics
+
+namespace OrlexGraphics
+{
+class VSelectionRegistry;
+class VSphereHelper;
+} // namespace OrlexGraphics
+
+namespace Flow2Graphics
+{
+
+/// The options of a class of subjects.
+const OrlexGraphics::VSubjectOptions& SubjectOptions(
+    const OrlexGraphics::VSceneOptions& i_rOptions, ESubjectClass i_Class);
+
+/// Draws bones, joints, targets, axes, origins and what is missing of all subjects: a walk over their arrays, that does
+/// no mathematics of subjects and allocates nothing. Render thread; made with the context current.
+class VRenderSubjectDynamics : public OrlexGraphics::IRenderType
+{
+public:
+	using VSubjects = std::vector<std::shared_ptr<const VRenderSubjectData>>;
+
+	/// Without the bones' mesh there are no bones, and the log says so.
+	VRenderSubjectDynamics(CoreGraphics::VShaderLibrary& io_rLibrary,
+	    std::shared_ptr<const OrlexGraphics::VSelectionRegistry> i_pRegistry,
+	    std::shared_ptr<OrlexGraphics::VSphereHelper> i_pSphereHelper);
+	~VRenderSubjectDynamics() override;
+
+	void SetSubjects(ESubjectClass i_Class, VSubjects i_Subjects) { m_Lists[i_Class] = std::move(i_Subjects); }
+	const VSubjects& Subjects(ESubjectClass i_Class) const { return m_Lists[i_Class]; }
+
+	void Render(CoreGraphics::VRenderContext& io_rContext, const OrlexGraphics::VSceneOptions& i_rOptions,
+	    std::uint32_t i_Pass) override;
+
+private:
+	/// The walk over one list.
+	struct VWalk
+	{
+		CoreGraphics::VRenderContext& m_rContext;
+		const VSubjects& m_rSubjects;
+		const OrlexGraphics::VSubjectOptions& m_rOptions;
+		std::uint32_t m_Pass;
+		/// Translucent bones are drawn as such.
+		bool m_bDual;
+		/// Ids instead of colours.
+		bool m_bPick;
+	};
+
+	/// A program with what it is given for each element.
+	struct VStep
+	{
+		CoreGraphics::VSelectableProgram m_Program;
+		CoreGraphics::VRenderState m_State;
+		CoreGraphics::VRenderState m_SelectionState;
+		CoreGraphics::VUniform m_Place;
+		CoreGraphics::VUniform m_Colour;
+
+		VStep(CoreGraphics::VShaderLibrary& io_rLibrary, const std::string& i_rVertex, const std::string& i_rFragment,
+		    const CoreGraphics::VRenderState& i_rState, const char* i_pPlace, const char* i_pColour);
+	};
+
+	void RenderList(const VWalk& i_rWalk);
+	void RenderPositionTargets(const VWalk& i_rWalk);
+	void RenderCovariances(const VWalk& i_rWalk);
+	void RenderBoxes(const VWalk& i_rWalk);
+	void RenderBones(const VWalk& i_rWalk);
+	void RenderRotationTargets(const VWalk& i_rWalk);
+	void RenderSpheres(const VWalk& i_rWalk, std::vector<VRenderSubjectData::VShape> VRenderSubjectData::*i_pSpheres,
+	    std::uint32_t i_LevelCap);
+	void RenderMissingMarkers(const VWalk& i_rWalk);
+	void RenderAxes(const VWalk& i_rWalk);
+
+	/// The program and its state, for drawing a shape. False if there is nothing to draw with.
+	bool Begin(const VWalk& i_rWalk, VStep& io_rStep, CoreGraphics::VShape& io_rShape);
+	/// False if the element is hidden from the pick.
+	template <typename TPlace>
+	bool Place(const VWalk& i_rWalk, VStep& io_rStep, const TPlace& i_rPlace, const QVector4D& i_rColour,
+	    const CoreGraphics::VSelectionId& i_rId);
+
+	const std::shared_ptr<const OrlexGraphics::VSelectionRegistry> m_pRegistry;
+	const std::shared_ptr<OrlexGraphics::VSphereHelper> m_pSphereHelper;
+	std::array<VSubjects, ESubjectClassCount> m_Lists;
+
+	CoreGraphics::VShape m_SolidBox;
+	CoreGraphics::VShape m_WireBox;
+	CoreGraphics::VShape m_Cylinder;
+	CoreGraphics::VShape m_Cone;
+	CoreGraphics::VShape m_Sphere;
+	CoreGraphics::VShape m_AxesLines;
+	std::optional<CoreGraphics::VShape> m_Bone;
+
+	VStep m_PositionTargets;
+	VStep m_Covariances;
+	VStep m_Boxes;
+	VStep m_Bones;
+	VStep m_TranslucentBones;
+	VStep m_Arrows;
+	VStep m_MissingMarkers;
+	VStep m_Axes;
+	/// Of shaft and head for each axis, within the frame of target or segment.
+	std::array<std::array<QMatrix4x4, 2>, 3> m_ArrowParts;
+};
+
+} // namespace Flow2Graphics
