@@ -96,6 +96,24 @@ TEST_F(QuickWidget, LoadsFromTheSourcesOnlyForADeveloper)
 	EXPECT_EQ(errors, 1) << "a file that is nowhere is told";
 }
 
+TEST_F(QuickWidget, SettingAPropertyAgainIsTakenAnew)
+{
+	Write("import QtQuick 2.15\nItem { property var counter: ({ n: 0 })\n"
+	      "property bool seen: { counter.n += 1; return flag }\nfunction count() { return counter.n } }");
+	VQuickWidget widget(m_pDeveloper);
+	widget.setContextProperty("flag", QVariant(true));
+	widget.Load(m_Folder.path(), "Panel.qml");
+	const auto count = [&widget]
+	{
+		QVariant result;
+		QMetaObject::invokeMethod(widget.rootObject(), "count", Q_RETURN_ARG(QVariant, result));
+		return result.toInt();
+	};
+	const int before = count();
+	widget.setContextProperty("flag", QVariant(true));
+	EXPECT_EQ(count(), before + 1) << "what acts on a property being set acts each time";
+}
+
 TEST_F(QuickWidget, ReloadsWhatHasChangedOnDisk)
 {
 	Write("import QtQuick 2.15\nItem { property int version: 1 }");

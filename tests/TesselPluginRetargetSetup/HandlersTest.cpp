@@ -5,6 +5,8 @@
 #include "OrlexGraphics/SkinCache.h"
 #include "TesselDataStore/StoredValue.h"
 
+#include <QTest>
+
 #include <limits>
 
 namespace
@@ -286,6 +288,48 @@ TEST_F(Handlers, SkinsAreLookedForInTheUsersFolder)
 	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "none");
 	Run();
 	EXPECT_EQ(status("dragon"), OrlexGraphics::SkinStatus::c_NotFound);
+}
+
+TEST_F(Handlers, ChoicesFollowTheDiskAndNothingElseMoves)
+{
+	const fs::path anna = Copy(c_DemoSource, "subjects/anna.qrs");
+	Copy(c_DemoFBX, "skins/dragon.fbx");
+	m_Context.Folders().SetFolder("FolderSubjects", m_Folder / "subjects");
+	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "skins");
+	Open();
+	EXPECT_EQ(Type("SourceSkeleton", "anna"), "");
+	EXPECT_EQ(Type("TargetFBX", "dragon"), "");
+	m_pDocument->CreateTargetSubject();
+	Run();
+	const auto names = [this](const char* i_pKey)
+	{
+		std::string text;
+		for (const TesselPluginInterface::VEnumEntry& rEntry : Parameter(i_pKey).GetEnumeration())
+			text += rEntry.m_Name + " ";
+		return text;
+	};
+	const auto becomes = [&](const char* i_pKey, const std::string& i_rNames)
+	{
+		return QTest::qWaitFor(
+		    [&]
+		    {
+			    Run();
+			    return names(i_pKey) == i_rNames;
+		    },
+		    60000);
+	};
+	m_pDocument->GetChangedSignal().Connect([this] { ++m_Changes; });
+	fs::copy_file(anna, m_Folder / "subjects/bea.qrs");
+	EXPECT_TRUE(becomes("SourceSkeleton", "anna bea ")) << names("SourceSkeleton");
+	fs::rename(m_Folder / "subjects/bea.qrs", m_Folder / "subjects/zoe.qrs");
+	EXPECT_TRUE(becomes("SourceSkeleton", "anna zoe ")) << names("SourceSkeleton");
+	EXPECT_EQ(Text("SourceSkeleton"), anna.string());
+	fs::remove(m_Folder / "skins/dragon.fbx");
+	EXPECT_TRUE(becomes("TargetFBX", "(None) ")) << names("TargetFBX");
+	EXPECT_EQ(Text("TargetFBX"), "");
+	EXPECT_TRUE(m_pDocument->GetFBXSkeleton()) << "what was read of it stays";
+	EXPECT_EQ(Text("SourceSkeleton"), anna.string());
+	EXPECT_EQ(m_Changes, 0);
 }
 
 TEST_F(Handlers, EndWithThePanel)

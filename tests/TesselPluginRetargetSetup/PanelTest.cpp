@@ -320,6 +320,18 @@ TEST_F(Panel, AddsAndRemovesTargetsOfTheSelection)
 	EXPECT_TRUE(Property("jointSymmetry", "checked").toBool());
 }
 
+TEST_F(Panel, ListsStayWhereTheyWereScrolledTo)
+{
+	OpenDemo();
+	Click("createTargetSubject");
+	for (const char* const pList : {"sourceSegmentsView", "targetSegmentsView"})
+		ASSERT_TRUE(Item(pList)->setProperty("contentY", 88.0));
+	m_pDocument->AddTarget(0, 0, true, false);
+	Run();
+	for (const char* const pList : {"sourceSegmentsView", "targetSegmentsView"})
+		EXPECT_EQ(Property(pList, "contentY").toDouble(), 88.0) << pList;
+}
+
 TEST_F(Panel, RemembersWhatWasLoadedAndNothingElse)
 {
 	OpenDemo();

@@ -158,8 +158,9 @@ TEST_F(Window, TheWholeJob)
 	rOperator.Fill("TargetWeight", "2.5");
 	rOperator.Fill("TargetStateExpressionX", "12.5");
 	rOperator.Fill("TargetStateExpressionY", "-3");
-	rOperator.Fill("TargetStateExpressionZ", "0");
-	edits += {"--weight", "6=2.5", "--state", "6=12.5,-3,0"};
+	rOperator.Replace("TargetStateExpressionZ", "-0.5");
+	edits += {"--weight", "6=2.5", "--state", "6=12.5,-3,-0.5"};
+	// What stands in a field belongs to the target that it was typed for.
 	rOperator.ClickRow("targets", 1);
 	EXPECT_EVENTUALLY(!rOperator.Property("TargetWeight", "text").toString().startsWith("2.5"));
 	rOperator.Click("removeTarget");

@@ -35,7 +35,7 @@ QQuickItem* Top(QQuickItem* i_pItem)
 
 bool Eventually(const std::function<bool()>& i_rCondition)
 {
-	return QTest::qWaitFor(i_rCondition, 10000);
+	return QTest::qWaitFor(i_rCondition, 60000);
 }
 
 VOperator::VOperator(QWidget& i_rWindow, QQuickWidget& i_rPanel) : m_rWindow(i_rWindow), m_rPanel(i_rPanel) {}
@@ -93,11 +93,16 @@ void VOperator::Type(const QString& i_rText)
 	QTest::qWait(0);
 }
 
-void VOperator::Fill(const QString& i_rName, const QString& i_rText)
+void VOperator::Replace(const QString& i_rName, const QString& i_rText)
 {
 	Click(i_rName);
 	Key(Qt::Key_A, Qt::ControlModifier);
 	Type(i_rText);
+}
+
+void VOperator::Fill(const QString& i_rName, const QString& i_rText)
+{
+	Replace(i_rName, i_rText);
 	Key(Qt::Key_Return);
 }
 

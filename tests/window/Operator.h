@@ -30,7 +30,9 @@ public:
 	void Key(int i_Key, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
 	void Type(const QString& i_rText);
 
-	/// Clicks a field, and puts a text in the place of what is there.
+	/// Clicks a field, and puts a text in the place of what is there; then nothing.
+	void Replace(const QString& i_rName, const QString& i_rText);
+	/// The same, and Enter.
 	void Fill(const QString& i_rName, const QString& i_rText);
 	/// Opens a box and picks the entry with this text.
 	void Choose(const QString& i_rName, const QString& i_rEntry);
