@@ -37,6 +37,15 @@ void* operator new[](std::size_t i_Size)
 {
 	return Allocate(i_Size);
 }
+// The software renderer's compiler allocates with these, and frees with those below.
+void* operator new(std::size_t i_Size, const std::nothrow_t&) noexcept
+{
+	return std::malloc(i_Size ? i_Size : 1);
+}
+void* operator new[](std::size_t i_Size, const std::nothrow_t&) noexcept
+{
+	return std::malloc(i_Size ? i_Size : 1);
+}
 void operator delete(void* i_pMemory) noexcept
 {
 	std::free(i_pMemory);
