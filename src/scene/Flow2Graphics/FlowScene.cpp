@@ -6,6 +6,7 @@
 #include "OrlexGraphics/RenderFloorGrid.h"
 #include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/RenderOutlines.h"
+#include "OrlexGraphics/RenderVolumeManipulator.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SkinCache.h"
 
@@ -66,6 +67,19 @@ void VFlowScene::InitialiseGL()
 	    std::make_shared<OrlexGraphics::VRenderManipulator>(*m_pShaderLibrary, m_pRegistry, SelectionManager());
 	m_pManipulator = m_pRenderManipulator;
 	m_RenderList.push_back(m_pRenderManipulator);
+	const auto addVolume = [&](const char* i_pName, const QVector3D& i_rColour, const OrlexGraphics::VVolume& i_rVolume)
+	{
+		auto pVolume = std::make_shared<OrlexGraphics::VRenderVolumeManipulator>(
+		    *m_pShaderLibrary, m_pRegistry, SelectionManager(), i_pName, i_rColour, i_rVolume);
+		m_RenderList.push_back(pVolume);
+		return pVolume;
+	};
+	m_pRenderReconstructionVolumeManipulator = addVolume("ReconstructionVolume", QVector3D(0.7f, 0.7f, 0.7f),
+	    {QVector3D(-10000.0f, -10000.0f, -100.0f), QVector3D(10000.0f, 10000.0f, 3000.0f)});
+	m_pRenderHotspotVolumeManipulator = addVolume("HotspotVolume", QVector3D(1.0f, 0.2f, 0.2f),
+	    {QVector3D(-5000.0f, -5000.0f, -100.0f), QVector3D(5000.0f, 5000.0f, 3000.0f)});
+	m_pReconstructionVolumeManipulator = m_pRenderReconstructionVolumeManipulator;
+	m_pHotspotVolumeManipulator = m_pRenderHotspotVolumeManipulator;
 	m_RenderList.push_back(std::make_shared<OrlexGraphics::VRenderAxis>(*m_pShaderLibrary));
 	m_PostList.push_back(std::make_shared<OrlexGraphics::VRenderOutlines>(*m_pShaderLibrary, m_pRegistry));
 }
@@ -96,7 +110,11 @@ void VFlowScene::Refresh()
 {
 	Registry().Reset();
 	if (m_pRenderManipulator)
+	{
 		m_pRenderManipulator->AllocateIds();
+		m_pRenderReconstructionVolumeManipulator->AllocateIds();
+		m_pRenderHotspotVolumeManipulator->AllocateIds();
+	}
 	if (m_pFrame)
 		OnFrame();
 	VOrlexScene::Refresh();

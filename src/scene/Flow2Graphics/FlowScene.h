@@ -9,7 +9,8 @@
 namespace OrlexGraphics
 {
 class VRenderManipulator;
-}
+class VRenderVolumeManipulator;
+} // namespace OrlexGraphics
 
 namespace Flow2Graphics
 {
@@ -33,6 +34,16 @@ public:
 	/// Null before the first frame.
 	const std::shared_ptr<OrlexGraphics::VRenderManipulator>& RenderManipulator() const { return m_pRenderManipulator; }
 
+	/// Hidden until someone shows them. Null before the first frame.
+	const std::shared_ptr<OrlexGraphics::VRenderVolumeManipulator>& RenderReconstructionVolumeManipulator() const
+	{
+		return m_pRenderReconstructionVolumeManipulator;
+	}
+	const std::shared_ptr<OrlexGraphics::VRenderVolumeManipulator>& RenderHotspotVolumeManipulator() const
+	{
+		return m_pRenderHotspotVolumeManipulator;
+	}
+
 	/// What is to be shown from the next exchange on. User interface thread.
 	void SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame);
 
@@ -54,6 +65,8 @@ private:
 	void OnFrame();
 
 	std::shared_ptr<OrlexGraphics::VRenderManipulator> m_pRenderManipulator;
+	std::shared_ptr<OrlexGraphics::VRenderVolumeManipulator> m_pRenderReconstructionVolumeManipulator;
+	std::shared_ptr<OrlexGraphics::VRenderVolumeManipulator> m_pRenderHotspotVolumeManipulator;
 	/// In the order in which they were made.
 	std::vector<std::shared_ptr<IFlowRenderType>> m_FlowTypes;
 	std::shared_ptr<VFlowRenderSubjectDynamics> m_pDynamics;

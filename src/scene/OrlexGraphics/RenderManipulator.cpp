@@ -4,6 +4,7 @@
 #include "CoreGraphics/SelectableProgram.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "CoreGraphics/Shapes.h"
+#include "OrlexGraphics/HandleSize.h"
 #include "OrlexGraphics/MeshFile.h"
 #include "OrlexGraphics/SceneOptions.h"
 #include "OrlexGraphics/SelectionKinds.h"
@@ -185,17 +186,14 @@ void VRenderManipulator::Render(VRenderContext& io_rContext, const VSceneOptions
 	if (i_Pass != EPassOverlay || !m_Drawn.m_bVisible || !i_rOptions.m_bManipulator
 	    || !i_rOptions.m_OverlayCamera.empty() || io_rContext.m_Mode == CoreGraphics::ERenderId)
 		return;
-	const QVector4D clip =
-	    io_rContext.m_Projection * (io_rContext.m_View * QVector4D(m_Drawn.m_Transform.column(3).toVector3D(), 1.0f));
-	if (!(clip.w() > 0.0f))
+	const std::optional<float> pixelSize = PixelSizeAt(io_rContext, m_Drawn.m_Transform.column(3).toVector3D());
+	if (!pixelSize)
 		return;
 	const bool bPick = io_rContext.m_Mode == CoreGraphics::ERenderPick;
 	if (!io_rContext.UseProgram(m_pDrawing->m_Program.Get(bPick)))
 		return;
 	io_rContext.ApplyState(bPick ? CoreGraphics::MakeSelectionState(HandleState()) : HandleState());
-	const float pixelScale =
-	    static_cast<float>(io_rContext.m_Viewport.height()) * io_rContext.m_Projection(1, 1) * 0.5f / clip.w();
-	const float size = m_Drawn.m_DPIRatio * i_rOptions.m_ManipulatorScale / pixelScale;
+	const float size = m_Drawn.m_DPIRatio * i_rOptions.m_ManipulatorScale * *pixelSize;
 	for (std::uint32_t axis = 0; axis < 3; ++axis)
 		RenderAxis(io_rContext, axis, size);
 }

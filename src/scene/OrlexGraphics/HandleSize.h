@@ -1,0 +1,18 @@
+#pragma once
+
+#include <optional>
+
+class QVector3D;
+
+namespace CoreGraphics
+{
+class VRenderContext;
+}
+
+namespace OrlexGraphics
+{
+
+/// Millimetres of a pixel of the viewport, where the place is. Nothing behind the eye.
+std::optional<float> PixelSizeAt(const CoreGraphics::VRenderContext& i_rContext, const QVector3D& i_rPlace);
+
+} // namespace OrlexGraphics

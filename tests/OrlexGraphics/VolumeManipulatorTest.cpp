@@ -1,0 +1,236 @@
+#include "../CoreGraphics/OffscreenContext.h"
+
+#include "CoreGraphics/CameraController.h"
+#include "CoreGraphics/RenderContext.h"
+#include "CoreGraphics/ShaderLibrary.h"
+#include "InMemoryHost/Selection.h"
+#include "OrlexGraphics/RenderVolumeManipulator.h"
+#include "OrlexGraphics/SceneOptions.h"
+#include "OrlexGraphics/SelectionRegistry.h"
+
+#include <QColor>
+#include <QOpenGLFramebufferObject>
+
+#include <algorithm>
+#include <cmath>
+
+using namespace OrlexGraphics;
+
+namespace
+{
+
+constexpr int c_Width = 400;
+constexpr int c_Height = 300;
+
+const VVolume c_Volume{QVector3D(-1000, -2000, -100), QVector3D(1000, 2000, 3000)};
+
+/// 20 mm a pixel, the world's origin in the middle.
+CoreGraphics::VCameraController MakeCamera(std::uint32_t i_Type, bool i_bYUp = false)
+{
+	CoreGraphics::VCameraController camera;
+	camera.m_Type = i_Type;
+	camera.m_bYUp = i_bYUp;
+	camera.m_OrthographicScale = 20.0f;
+	camera.SetSize(QSize(c_Width, c_Height));
+	camera.Update();
+	return camera;
+}
+
+class VolumeManipulator : public GraphicsTest::InBothDialects
+{
+protected:
+	void SetUp() override
+	{
+		InBothDialects::SetUp();
+		m_Library.InitialiseGL();
+		m_Render.Initialise();
+		m_Render.ResetState();
+		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Width, c_Height, QOpenGLFramebufferObject::Depth);
+		m_Render.BindFramebuffer(m_pTarget.get());
+		m_pManipulator = std::make_unique<VRenderVolumeManipulator>(
+		    m_Library, m_pRegistry, m_pSelection, "Volume", QVector3D(1.0f, 0.0f, 1.0f), c_Volume);
+	}
+
+	/// Whether anything was drawn.
+	bool Draw(std::uint32_t i_Mode = CoreGraphics::ERenderNormal, std::uint32_t i_Pass = EPassOverlay)
+	{
+		m_pRegistry->SetSelection(m_pSelection->Selection().Items(), m_pSelection->PreSelection().Items());
+		m_pRegistry->Reset();
+		m_pRegistry->ClearExcluded();
+		m_pManipulator->AllocateIds();
+		m_pManipulator->Synchronise();
+		m_Camera.Apply(m_Render);
+		m_Render.m_Mode = i_Mode;
+		m_Render.SetClearColour(Qt::black);
+		m_Render.ClearBuffers(true, true);
+		m_pManipulator->Render(m_Render, m_Options, i_Pass);
+		m_Render.ReadPixels(QRect(0, 0, c_Width, c_Height), m_Pixels);
+		return !std::equal(m_Pixels.begin() + 4, m_Pixels.end(), m_Pixels.begin());
+	}
+
+	/// From the upper left corner, as the mouse has it.
+	std::uint32_t ColourAt(int i_X, int i_Y) const
+	{
+		const auto first = m_Pixels.begin() + 4 * ((c_Height - 1 - i_Y) * c_Width + i_X);
+		return static_cast<std::uint32_t>(first[0] | first[1] << 8 | first[2] << 16);
+	}
+
+	NVX::ISelectionItem ItemAt(int i_X, int i_Y) const
+	{
+		NVX::ISelectionItem item;
+		m_pRegistry->ResolveId(ColourAt(i_X, i_Y), item);
+		return item;
+	}
+
+	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
+	    std::make_shared<InMemoryHost::VSelectionManager>();
+	const std::shared_ptr<VSelectionRegistry> m_pRegistry = std::make_shared<VSelectionRegistry>();
+	CoreGraphics::VShaderLibrary m_Library;
+	CoreGraphics::VRenderContext m_Render;
+	CoreGraphics::VCameraController m_Camera = MakeCamera(CoreGraphics::ECameraTop);
+	VSceneOptions m_Options;
+	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
+	std::unique_ptr<VRenderVolumeManipulator> m_pManipulator;
+	std::vector<std::uint8_t> m_Pixels;
+};
+INSTANTIATE_IN_BOTH_DIALECTS(VolumeManipulator);
+
+constexpr std::uint32_t c_Magenta = 0xff00ff;
+constexpr std::uint32_t c_Yellow = 0x00ffff;
+
+} // namespace
+
+TEST(VolumeDrag, HandlesMoveTheirSides)
+{
+	struct VRow
+	{
+		const char* m_pName;
+		std::uint32_t m_Type;
+		bool m_bYUp;
+		VVolumeHandle m_Handle;
+		QPoint m_Move;
+		VVolume m_Expected;
+	};
+	const QVector3D low = c_Volume.m_Minimum, high = c_Volume.m_Maximum;
+	// From above X points to the left and Y down; from the front Z is up. With Y up, from above X points to the right
+	// and Z down.
+	const VRow rows[] = {
+	    {"lower X", CoreGraphics::ECameraTop, false, {EVolumeFace, 0}, {10, 5}, {low - QVector3D(200, 0, 0), high}},
+	    {"upper X", CoreGraphics::ECameraTop, false, {EVolumeFace, 1}, {-10, 0}, {low, high + QVector3D(200, 0, 0)}},
+	    {"lower Y", CoreGraphics::ECameraTop, false, {EVolumeFace, 2}, {0, 10}, {low + QVector3D(0, 200, 0), high}},
+	    {"upper Z", CoreGraphics::ECameraFront, false, {EVolumeFace, 5}, {3, -10}, {low, high + QVector3D(0, 0, 200)}},
+	    {"through the other side", CoreGraphics::ECameraTop, false, {EVolumeFace, 1}, {300, 0},
+	        {low, QVector3D(-990, 2000, 3000)}},
+	    {"corner", CoreGraphics::ECameraTop, false, {EVolumeCorner, 1}, {-10, 20},
+	        {low + QVector3D(0, 400, 0), high + QVector3D(200, 0, 0)}},
+	    {"opposite corner", CoreGraphics::ECameraTop, false, {EVolumeCorner, 2}, {-10, 20},
+	        {low + QVector3D(200, 0, 0), high + QVector3D(0, 400, 0)}},
+	    {"centre", CoreGraphics::ECameraTop, false, {EVolumeCentre, 0}, {-10, 20},
+	        {low + QVector3D(200, 400, 0), high + QVector3D(200, 400, 0)}},
+	    {"centre, Y up", CoreGraphics::ECameraTop, true, {EVolumeCentre, 0}, {-10, 20},
+	        {low + QVector3D(-200, 0, 400), high + QVector3D(-200, 0, 400)}},
+	    {"corner, Y up", CoreGraphics::ECameraTop, true, {EVolumeCorner, 3}, {10, 10},
+	        {low, high + QVector3D(200, 0, 200)}}};
+	for (const VRow& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		const CoreGraphics::VCameraController camera = MakeCamera(rRow.m_Type, rRow.m_bYUp);
+		const auto drag = VVolumeDrag::Press(camera, {123, 45}, rRow.m_Handle, c_Volume);
+		ASSERT_TRUE(drag);
+		const auto moved = drag->Drag(camera, QPoint(123, 45) + rRow.m_Move);
+		ASSERT_TRUE(moved);
+		EXPECT_LT((moved->m_Minimum - rRow.m_Expected.m_Minimum).length(), 0.1f);
+		EXPECT_LT((moved->m_Maximum - rRow.m_Expected.m_Maximum).length(), 0.1f);
+	}
+	// Along the view there is no place for the mouse, and there are no other handles.
+	const CoreGraphics::VCameraController top = MakeCamera(CoreGraphics::ECameraTop);
+	EXPECT_FALSE(VVolumeDrag::Press(top, {1, 1}, {EVolumeFace, 5}, c_Volume));
+	EXPECT_FALSE(VVolumeDrag::Press(MakeCamera(CoreGraphics::ECameraFront), {1, 1}, {EVolumeCentre, 0}, c_Volume));
+	for (const VVolumeHandle& rHandle : {VVolumeHandle{EVolumeFace, 6}, {EVolumeCorner, 4}, {EVolumeCentre, 1}, {3, 0}})
+		EXPECT_FALSE(VVolumeDrag::Press(top, {1, 1}, rHandle, c_Volume));
+}
+
+TEST(VolumeDrag, CornersStandOnTheFloor)
+{
+	EXPECT_EQ(VolumeHandlePlace(c_Volume, {EVolumeCorner, 0}, false), QVector3D(-1000, -2000, -100));
+	EXPECT_EQ(VolumeHandlePlace(c_Volume, {EVolumeCorner, 3}, false), QVector3D(1000, 2000, -100));
+	EXPECT_EQ(VolumeHandlePlace(c_Volume, {EVolumeCorner, 2}, true), QVector3D(-1000, -2000, 3000));
+	EXPECT_EQ(VolumeHandlePlace(c_Volume, {EVolumeFace, 4}, false), QVector3D(0, 0, -100));
+	EXPECT_EQ(VolumeHandlePlace(c_Volume, {EVolumeCentre, 0}, true), QVector3D(0, 0, 1450));
+}
+
+TEST(VolumeDrag, ArrowsFadeWhereTheyPointAtTheEye)
+{
+	for (const auto& [angle, opacity] :
+	    {std::pair(0.0, 0.0f), {0.09, 0.0f}, {0.15, 0.25f}, {0.2, 0.5f}, {0.3, 1.0f}, {1.5, 1.0f}})
+	{
+		EXPECT_NEAR(VRenderVolumeManipulator::ArrowOpacity(static_cast<float>(std::cos(angle))), opacity, 1e-3f);
+		EXPECT_NEAR(VRenderVolumeManipulator::ArrowOpacity(static_cast<float>(-std::cos(angle))), opacity, 1e-3f);
+	}
+	// Rounding may take a cosine beyond 1.
+	EXPECT_EQ(VRenderVolumeManipulator::ArrowOpacity(1.0001f), 0.0f);
+}
+
+TEST_P(VolumeManipulator, DrawsItsBoxAndHandlesWhenShown)
+{
+	EXPECT_FALSE(Draw());
+	m_pManipulator->SetVisible(true);
+	EXPECT_TRUE(Draw());
+	// From above: X from 150 to 250 pixels, Y from 50 to 250; an arrow of 48 pixels out of each side, none at the eye.
+	EXPECT_EQ(ColourAt(280, 150), c_Magenta);
+	EXPECT_EQ(ColourAt(120, 150), c_Magenta);
+	EXPECT_EQ(ColourAt(200, 20), c_Magenta);
+	EXPECT_EQ(ColourAt(200, 280), c_Magenta);
+	EXPECT_EQ(ColourAt(250, 50), c_Magenta);
+	EXPECT_EQ(ColourAt(200, 150), c_Magenta);
+	EXPECT_EQ(ColourAt(200, 170), 0u);
+	EXPECT_EQ(ColourAt(300, 150), 0u);
+
+	EXPECT_TRUE(Draw(CoreGraphics::ERenderPick));
+	EXPECT_EQ(ItemAt(280, 150), m_pManipulator->HandleItem({EVolumeFace, 0}));
+	EXPECT_EQ(ItemAt(200, 280), m_pManipulator->HandleItem({EVolumeFace, 3}));
+	EXPECT_EQ(ItemAt(250, 50), m_pManipulator->HandleItem({EVolumeCorner, 0}));
+	EXPECT_EQ(ItemAt(200, 150), m_pManipulator->HandleItem({EVolumeCentre, 0}));
+
+	EXPECT_FALSE(Draw(CoreGraphics::ERenderId));
+	EXPECT_FALSE(Draw(CoreGraphics::ERenderNormal, EPassOpaque));
+	m_Options.m_bManipulator = false;
+	EXPECT_FALSE(Draw());
+}
+
+TEST_P(VolumeManipulator, APressDragsTheHandleThatIsPointedAt)
+{
+	std::vector<VVolume> changes;
+	m_pManipulator->ChangedSignal().Connect(
+	    [&](const QVector3D& i_rLow, const QVector3D& i_rHigh) {
+		    changes.push_back({i_rLow, i_rHigh});
+	    });
+	const NVX::ISelectionItem handle = m_pManipulator->HandleItem({EVolumeFace, 0});
+	m_pSelection->PreSelection().Replace({handle});
+	EXPECT_FALSE(m_pManipulator->IsHovered());
+	m_pManipulator->SetVisible(true);
+	EXPECT_TRUE(m_pManipulator->IsHovered());
+	Draw();
+	EXPECT_EQ(ColourAt(280, 150), c_Yellow);
+
+	m_pManipulator->Press(m_Camera, {280, 150});
+	EXPECT_TRUE(m_pManipulator->IsDragging());
+	EXPECT_EQ(m_pSelection->Selection().Items(), std::vector<NVX::ISelectionItem>{handle});
+	m_pManipulator->Drag(m_Camera, {290, 150}, {});
+	ASSERT_EQ(changes.size(), 1u);
+	EXPECT_NEAR(changes[0].m_Minimum.x(), -1200.0f, 0.1f);
+	EXPECT_EQ(changes[0].m_Maximum, c_Volume.m_Maximum);
+	EXPECT_EQ(m_pManipulator->Volume(), changes[0]);
+	m_pManipulator->SetVolume(c_Volume);
+	EXPECT_EQ(m_pManipulator->Volume(), changes[0]);
+	m_pManipulator->Release();
+	EXPECT_TRUE(m_pSelection->Selection().Items().empty());
+	m_pManipulator->SetVolume(c_Volume);
+	EXPECT_EQ(m_pManipulator->Volume(), c_Volume);
+
+	// Another volume's handle is not this one's.
+	NVX::ISelectionItem other = handle;
+	other.m_Name = "Other";
+	m_pSelection->PreSelection().Replace({other});
+	EXPECT_FALSE(m_pManipulator->IsHovered());
+}
