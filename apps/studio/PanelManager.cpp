@@ -27,6 +27,8 @@ void VPanelManager::AddPanel(const std::string& i_rTitle, std::int32_t i_Order, 
 	Named(pDock, QString("Panel " + title).toUtf8(), title);
 	pDock->setAllowedAreas(Qt::AllDockWidgetAreas);
 	pDock->setWidget(i_pWidget);
+	// What the window has to spare goes to the panels; the upper and lower areas would share it evenly.
+	pDock->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Expanding);
 	if (auto* const pQuick = qobject_cast<NVX::IQuickWidget*>(i_pWidget))
 	{
 		QObject::connect(pDock, &QDockWidget::visibilityChanged, i_pWidget,
@@ -36,7 +38,7 @@ void VPanelManager::AddPanel(const std::string& i_rTitle, std::int32_t i_Order, 
 	    m_Panels.begin(), m_Panels.end(), [i_Order](const VPanel& i_rPanel) { return i_rPanel.m_Order > i_Order; });
 	m_Panels.insert(behind, {i_Order, pDock});
 
-	m_pWindow->addDockWidget(Qt::TopDockWidgetArea, pDock);
+	m_pWindow->addDockWidget(Qt::LeftDockWidgetArea, pDock);
 	const QList<QDockWidget*> docks = Docks();
 	for (int i = 1; i < docks.size(); ++i)
 		m_pWindow->tabifyDockWidget(docks[i - 1], docks[i]);

@@ -11,7 +11,7 @@ class QMainWindow;
 namespace StudioHost
 {
 
-/// Docks panels in the upper part of a window, as tabs in ascending order if there are several.
+/// Docks panels in the middle of a window, as tabs in ascending order if there are several.
 class VPanelManager : public NVX::VCounted<TesselPluginInterface::IPanelManager>
 {
 public:

@@ -87,12 +87,8 @@ int Fail(CommandLine::EExitStatus i_Status, const std::string& i_rMessage)
 
 std::unique_ptr<QSettings> OpenSettings(const QString& i_rPath)
 {
-	auto pSettings =
-	    i_rPath.isEmpty() ? std::make_unique<QSettings>() : std::make_unique<QSettings>(i_rPath, QSettings::IniFormat);
-	if (pSettings->status() != QSettings::NoError)
-		NVX_LOG(
-		    c_pCategory, NVX::ELogWarning, "The settings in %1% cannot be read", pSettings->fileName().toStdString());
-	return pSettings;
+	return i_rPath.isEmpty() ? std::make_unique<QSettings>()
+	                         : std::make_unique<QSettings>(i_rPath, QSettings::IniFormat);
 }
 
 int RunScreenshot(QApplication& io_rApplication, VStudioWindow& io_rWindow, const QString& i_rPath)
@@ -117,8 +113,12 @@ int RunWindow(QApplication& io_rApplication, const VOptions& i_rOptions)
 {
 	const VErrorCount errors;
 	const std::unique_ptr<QSettings> pSettings = OpenSettings(i_rOptions.m_Settings);
-	CheckOpenGL();
 	VStudioWindow window(*pSettings, i_rOptions.m_bDeveloper);
+	// From here on messages stand in the window's list, too.
+	if (pSettings->status() != QSettings::NoError)
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "The settings in %1% cannot be read: what is set now will not be kept",
+		    pSettings->fileName().toStdString());
+	CheckOpenGL();
 	const QString module = i_rOptions.m_Module.isEmpty() ? DefaultModulePath() : i_rOptions.m_Module;
 	if (module.isEmpty())
 		NVX_LOG(c_pCategory, NVX::ELogError, "The module that comes with this program is not in its place");

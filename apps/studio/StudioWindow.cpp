@@ -18,7 +18,7 @@
 #include <QMenu>
 #include <QMessageBox>
 #include <QMimeData>
-#include <QStatusBar>
+#include <QTimer>
 
 namespace StudioHost
 {
@@ -27,6 +27,8 @@ namespace
 
 /// Raised when docks change so that an old layout does not fit them.
 constexpr int c_LayoutVersion = 1;
+/// In pixels; a few messages.
+constexpr int c_LogHeight = 180;
 const QString c_GeometryKey = QStringLiteral("Window/Geometry");
 const QString c_StateKey = QStringLiteral("Window/State");
 
@@ -63,11 +65,11 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 
 	m_pLogDock = Named(new QDockWidget(tr("Log"), this), "LogDock", tr("Log"));
 	m_pLogDock->setWidget(new VLogPanel(*m_pLog));
+	m_pLogDock->setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Maximum);
 	addDockWidget(Qt::BottomDockWidgetArea, m_pLogDock);
 
 	MakeMenus(i_bDeveloper);
 	resize(1280, 800);
-	resizeDocks({m_pLogDock}, {130}, Qt::Vertical);
 }
 
 VStudioWindow::~VStudioWindow()
@@ -97,14 +99,18 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 	NVX_LOG("System", NVX::ELogInformation, "Module %1% is loaded", pModule->Path().toStdString());
 	m_pModule = std::move(pModule);
 
-	for (QDockWidget* pDock : m_pGui->PanelManager().Docks())
+	const QList<QDockWidget*> docks = m_pGui->PanelManager().Docks();
+	for (QDockWidget* pDock : docks)
 		m_pPanelMenu->addAction(pDock->toggleViewAction());
 	for (QWidget* pPanel : m_pGui->PanelManager().Panels())
 		if (!m_pRetargetPanel)
 			m_pRetargetPanel = VRetargetPanel::Find(*pPanel, m_pContext->GetParameterRegistry());
 	if (m_pRetargetPanel)
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::fileUsed, m_pRecentFiles.get(), &VRecentFiles::Add);
-	m_pNotice->setVisible(m_pGui->PanelManager().Panels().isEmpty());
+	m_pNotice->setVisible(docks.isEmpty());
+	// Below a panel it keeps its height when the window grows; in an area of its own it would not.
+	if (!docks.isEmpty())
+		splitDockWidget(docks.front(), m_pLogDock, Qt::Vertical);
 	return true;
 }
 
@@ -135,12 +141,20 @@ bool VStudioWindow::Execute(const QString& i_rCommand)
 void VStudioWindow::RestoreLayout()
 {
 	restoreGeometry(m_rSettings.value(c_GeometryKey).toByteArray());
-	restoreState(m_rSettings.value(c_StateKey).toByteArray(), c_LayoutVersion);
+	m_bArranged = restoreState(m_rSettings.value(c_StateKey).toByteArray(), c_LayoutVersion);
 }
 
 void VStudioWindow::ShowPreferences()
 {
 	VPreferencesDialog(m_pContext->Preferences(), this).exec();
+}
+
+void VStudioWindow::showEvent(QShowEvent* i_pEvent)
+{
+	QMainWindow::showEvent(i_pEvent);
+	// The layout has its size only now.
+	if (!std::exchange(m_bArranged, true))
+		QTimer::singleShot(0, this, [this] { resizeDocks({m_pLogDock}, {c_LogHeight}, Qt::Vertical); });
 }
 
 void VStudioWindow::closeEvent(QCloseEvent* i_pEvent)

@@ -52,6 +52,7 @@ public:
 	void ShowPreferences();
 
 protected:
+	void showEvent(QShowEvent* i_pEvent) override;
 	void closeEvent(QCloseEvent* i_pEvent) override;
 	void dragEnterEvent(QDragEnterEvent* i_pEvent) override;
 	void dropEvent(QDropEvent* i_pEvent) override;
@@ -84,6 +85,8 @@ private:
 	/// What stands in the window where there is no panel.
 	QLabel* m_pNotice = nullptr;
 	QDockWidget* m_pLogDock = nullptr;
+	/// The docks have the sizes that they shall begin with.
+	bool m_bArranged = false;
 };
 
 } // namespace StudioHost

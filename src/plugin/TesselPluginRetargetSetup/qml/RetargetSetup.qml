@@ -332,13 +332,6 @@ Rectangle {
 					}
 				}
 
-				OrlexLabel {
-					objectName: "noPreview"
-					anchors.centerIn: sceneFBO
-					visible: GraphicsInfo.api === GraphicsInfo.Software
-					text: "No preview: this display has no OpenGL"
-				}
-
 				Column {
 					objectName: "filters"
 					visible: viewFilters.checked
