@@ -5,6 +5,7 @@
 #include "OrlexGraphics/TesselInteractionMapper.h"
 
 #include <QMouseEvent>
+#include <QOpenGLFunctions>
 #include <QQuickItem>
 #include <QQuickWindow>
 #include <QTest>
@@ -74,6 +75,8 @@ public:
 			io_rContext.SetUniform(m_ModelColour, rDrawn.m_Colour);
 			io_rContext.DrawElements(GL_TRIANGLES, m_Box.m_Indices);
 		}
+		if (io_rContext.m_pFunctions->glGetError() != GL_NO_ERROR)
+			++VBoxScene::s_GLErrors;
 	}
 
 private:
@@ -109,6 +112,8 @@ NVX::ISelectionItem Item(std::uint32_t i_Index, std::uint32_t i_Kind)
 {
 	return {i_Kind, 0x0fffffff, i_Index, {}};
 }
+
+std::atomic<int> VBoxScene::s_GLErrors = 0;
 
 void VBoxScene::InitialiseGL()
 {
@@ -148,6 +153,7 @@ VViewTest::VViewTest()
 VViewTest::~VViewTest()
 {
 	Close();
+	EXPECT_EQ(VBoxScene::s_GLErrors, 0);
 }
 
 void VViewTest::Close()
@@ -203,7 +209,9 @@ QRgb VViewTest::Pixel(int i_X, int i_Y)
 {
 	const QImage image = Grab();
 	const double ratio = m_pView->window()->effectiveDevicePixelRatio();
-	return image.pixel(static_cast<int>(i_X * ratio), static_cast<int>(i_Y * ratio));
+	const QPoint pixel(static_cast<int>(i_X * ratio), static_cast<int>(i_Y * ratio));
+	// A window that is being resized may not be so large yet.
+	return image.valid(pixel) ? image.pixel(pixel) : 0;
 }
 
 void VViewTest::Leave()

@@ -70,6 +70,8 @@ public:
 	/// Of the view.
 	QSize m_Size;
 	std::atomic<int> m_Refreshes = 0;
+	/// Walks over the boxes after which OpenGL had complained.
+	static std::atomic<int> s_GLErrors;
 	using VFlowScene::m_bExactPick;
 
 private:

@@ -211,27 +211,49 @@ TEST_F(VViewTest, DISABLED_SaysThatThereIsNoOpenGL)
 	Close();
 }
 
+/// As often as RETARGET_TEST_CYCLES says: each cycle draws, hides, resizes, docks elsewhere and loads anew.
 TEST_F(VViewTest, EndsItsRenderersWithTheirWindows)
 {
 	using OrlexGraphics::VSceneFramebufferRenderer;
 	const std::uint64_t living = VSceneFramebufferRenderer::LivingCount();
 	const std::uint64_t made = VSceneFramebufferRenderer::MadeCount();
+	const int cycles =
+	    qEnvironmentVariableIsSet("RETARGET_TEST_CYCLES") ? qEnvironmentVariableIntValue("RETARGET_TEST_CYCLES") : 5;
+	const auto isSelected = [&] { return Pixel(40, 40) == 0xff4040ff; };
 	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}};
 	m_pSelection->Selection().Replace({Item(1)});
-	for (int i = 0; i < 5; ++i)
+	for (int i = 0; i < cycles; ++i)
 	{
 		Show();
-		ASSERT_TRUE(Until([&] { return Pixel(40, 40) == 0xff4040ff; })) << i;
+		ASSERT_TRUE(Until(isSelected)) << i;
 		Resize(0, 0);
 		SetVisible(false);
 		Resize(300, 200);
 		SetVisible(true);
 		ASSERT_TRUE(Until([&] { return Pixel(290, 190) == c_Background; })) << i;
+		if (m_pWidget)
+		{
+			// A dock is another window, with another context.
+			QWidget dock;
+			m_pWidget->setParent(&dock);
+			m_pScene->RequestRefresh();
+			dock.resize(c_Width, c_Height);
+			m_pWidget->resize(c_Width, c_Height);
+			m_pWidget->show();
+			dock.show();
+			ASSERT_TRUE(Until(isSelected)) << i;
+			m_pWidget->setParent(nullptr);
+			m_pWidget->show();
+			ASSERT_TRUE(Until(isSelected)) << i;
+		}
+		// Away in the middle of a pick.
+		Hover({40, 40});
+		m_pScene->RequestRefresh();
 		Close();
 		EXPECT_EQ(VSceneFramebufferRenderer::LivingCount(), living) << i;
 		EXPECT_EQ(m_pScene.use_count(), 1) << i;
 	}
-	EXPECT_GE(VSceneFramebufferRenderer::MadeCount(), made + 5);
+	EXPECT_GE(VSceneFramebufferRenderer::MadeCount(), made + static_cast<std::uint64_t>(cycles));
 }
 
 } // namespace
