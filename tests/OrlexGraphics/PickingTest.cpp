@@ -163,4 +163,33 @@ TEST(Picking, KnowsWhatCannotBeInTheRectangle)
 		    << rRow.m_Sphere.x() << " " << rRow.m_Sphere.y() << " " << rRow.m_Sphere.z();
 }
 
+TEST(Picking, KnowsWhereSpheresAreOnTheScreen)
+{
+	QMatrix4x4 viewProjection;
+	viewProjection.perspective(90.0f, 2.0f, 1.0f, 1000.0f);
+	const QSize frame(400, 200);
+	const struct
+	{
+		const char* m_pName;
+		std::vector<QVector4D> m_Spheres;
+		/// What it must hold and what it may hold.
+		QRect m_Inner;
+		QRect m_Outer;
+	} rows[] = {
+	    {"nothing", {}, {}, {}},
+	    {"in the middle", {{0, 0, -100, 10}}, {190, 90, 20, 20}, {186, 86, 28, 28}},
+	    {"two", {{0, 0, -100, 10}, {100, 50, -100, 1}}, {190, 90, 111, 61}, {186, 86, 118, 68}},
+	    {"cut off", {{-200, 0, -100, 10}}, {0, 90, 10, 20}, {0, 86, 32, 28}},
+	    {"beside the frame", {{-300, 0, -100, 10}}, {}, {}},
+	    {"around the eye", {{0, 0, 0, 10}}, {0, 0, 400, 200}, {0, 0, 400, 200}},
+	    {"through the plane of the eye", {{500, 0, 5, 10}}, {0, 0, 400, 200}, {0, 0, 400, 200}},
+	};
+	for (const auto& rRow : rows)
+	{
+		const QRect found = OrlexGraphics::ScreenRectangle(rRow.m_Spheres, viewProjection, frame);
+		EXPECT_TRUE(rRow.m_Inner.isEmpty() ? found.isEmpty() : found.contains(rRow.m_Inner)) << rRow.m_pName;
+		EXPECT_TRUE(found.isEmpty() || rRow.m_Outer.contains(found)) << rRow.m_pName;
+	}
+}
+
 } // namespace

@@ -272,10 +272,10 @@ void VRenderContext::SetViewport(const QRect& i_rViewport)
 	m_pFunctions->glViewport(i_rViewport.x(), i_rViewport.y(), i_rViewport.width(), i_rViewport.height());
 }
 
-void VRenderContext::SetScissor()
+void VRenderContext::SetScissor(const QRect& i_rRectangle)
 {
 	m_pFunctions->glEnable(GL_SCISSOR_TEST);
-	m_pFunctions->glScissor(m_Viewport.x(), m_Viewport.y(), m_Viewport.width(), m_Viewport.height());
+	m_pFunctions->glScissor(i_rRectangle.x(), i_rRectangle.y(), i_rRectangle.width(), i_rRectangle.height());
 }
 
 void VRenderContext::ResetScissor()

@@ -94,6 +94,8 @@ public:
 	QOpenGLFramebufferObject* m_pFramebuffer = nullptr;
 	/// Where the outlines are drawn before they are smoothed; null if there is none.
 	QOpenGLFramebufferObject* m_pOutlineFramebuffer = nullptr;
+	/// Where outlines can be, in device pixels from the lower left corner; empty if there are none.
+	QRect m_OutlineRectangle;
 	/// The program in use.
 	std::shared_ptr<VShaderProgram> m_pProgram;
 	/// What BindDefaultFramebuffer binds: not 0 where Qt Quick draws into a framebuffer object.
@@ -136,7 +138,8 @@ public:
 
 	void SetViewport(const QRect& i_rViewport);
 	/// Nothing outside of the viewport is drawn or cleared, until ResetScissor.
-	void SetScissor();
+	void SetScissor() { SetScissor(m_Viewport); }
+	void SetScissor(const QRect& i_rRectangle);
 	void ResetScissor();
 	void SetYUp(bool i_bYUp);
 

@@ -104,7 +104,8 @@ void VFrameRenderer::BeginFrame()
 void VFrameRenderer::Render(QOpenGLFramebufferObject& io_rTarget)
 {
 	BeginFrame();
-	if (m_pScene && m_pScene->Registry().HasFlagged())
+	m_Context.m_OutlineRectangle = OutlineRectangle();
+	if (!m_Context.m_OutlineRectangle.isEmpty())
 	{
 		m_Context.m_Mode = CoreGraphics::ERenderId;
 		m_Context.BindFramebuffer(m_pIdFramebuffer.get());
@@ -119,9 +120,25 @@ void VFrameRenderer::Render(QOpenGLFramebufferObject& io_rTarget)
 	m_Context.ResetScissor();
 }
 
+QRect VFrameRenderer::OutlineRectangle()
+{
+	if (!m_pScene || !m_pScene->Registry().HasFlagged())
+		return {};
+	const QRect frame(QPoint(), m_Size);
+	if (!m_pScene->Registry().GetFlaggedBounds(m_Bounds))
+		return frame;
+	const QRect bounds = ScreenRectangle(m_Bounds, m_Context.m_Projection * m_Context.m_View, m_Size);
+	// Room for the edges, which look at the pixels around them.
+	constexpr int c_Edge = 6;
+	return bounds.isEmpty() ? bounds : bounds.adjusted(-c_Edge, -c_Edge, c_Edge, c_Edge) & frame;
+}
+
 void VFrameRenderer::RenderScene()
 {
-	m_Context.SetScissor();
+	if (m_Context.m_Mode == CoreGraphics::ERenderId)
+		m_Context.SetScissor(m_Context.m_OutlineRectangle);
+	else
+		m_Context.SetScissor();
 	const VSceneOptions& rOptions = m_Input.m_Options;
 	const bool bBackground =
 	    m_Context.m_Mode == CoreGraphics::ERenderNormal && (rOptions.m_OverlayCamera.empty() || !rOptions.m_b3D);

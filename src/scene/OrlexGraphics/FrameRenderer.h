@@ -77,6 +77,8 @@ public:
 
 private:
 	void BeginFrame();
+	/// Where outlines can be, in device pixels from the lower left corner.
+	QRect OutlineRectangle();
 	/// A whole frame in the context's mode.
 	void RenderScene();
 	void RenderPasses();
@@ -94,6 +96,8 @@ private:
 	std::unique_ptr<QOpenGLFramebufferObject> m_pIdFramebuffer;
 	std::unique_ptr<QOpenGLFramebufferObject> m_pPickFramebuffer;
 	std::unique_ptr<QOpenGLFramebufferObject> m_pOutlineFramebuffer;
+	/// Of what is selected.
+	std::vector<QVector4D> m_Bounds;
 	std::vector<std::uint8_t> m_Pixels;
 	/// By id.
 	std::vector<bool> m_Found;

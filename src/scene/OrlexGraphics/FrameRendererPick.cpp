@@ -6,7 +6,6 @@
 
 #include <QColor>
 #include <QOpenGLFramebufferObject>
-#include <QOpenGLFunctions>
 
 #include <algorithm>
 
@@ -66,9 +65,7 @@ void VFrameRenderer::Pick(const VPickRequest& i_rRequest, VPick& o_rPick)
 
 void VFrameRenderer::ReadIds(const QRect& i_rRectangle)
 {
-	QOpenGLFunctions& rGL = *m_Context.m_pFunctions;
-	rGL.glEnable(GL_SCISSOR_TEST);
-	rGL.glScissor(i_rRectangle.x(), i_rRectangle.y(), i_rRectangle.width(), i_rRectangle.height());
+	m_Context.SetScissor(i_rRectangle);
 	m_Context.ClearBuffers(true, true);
 	m_pScene->SphereHelper()->Clear();
 	if (!m_Input.m_Options.m_bCameraView)

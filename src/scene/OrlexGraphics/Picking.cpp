@@ -139,4 +139,36 @@ VPickFrustum MakePickFrustum(const QMatrix4x4& i_rViewProjection, const QRect& i
 	return frustum;
 }
 
+QRect ScreenRectangle(
+    const std::vector<QVector4D>& i_rSpheres, const QMatrix4x4& i_rViewProjection, const QSize& i_rFrame)
+{
+	const QRect frame(QPoint(), i_rFrame);
+	const QVector4D rows[] = {i_rViewProjection.row(0), i_rViewProjection.row(1), i_rViewProjection.row(3)};
+	QRectF all;
+	for (const QVector4D& rSphere : i_rSpheres)
+	{
+		const QVector4D centre(rSphere.toVector3D(), 1.0f);
+		const auto reach = [&](int i_Row) { return rSphere.w() * rows[i_Row].toVector3D().length(); };
+		const float w = QVector4D::dotProduct(rows[2], centre);
+		// Of all points of the sphere: no point is nearer to the eye, none farther.
+		const float nearest = w - reach(2);
+		const float farthest = w + reach(2);
+		if (!(nearest > 0.0f))
+			return frame;
+		float edges[2][2];
+		for (int axis = 0; axis < 2; ++axis)
+		{
+			const float low = QVector4D::dotProduct(rows[axis], centre) - reach(axis);
+			const float high = low + 2.0f * reach(axis);
+			edges[axis][0] = low / (low < 0.0f ? nearest : farthest);
+			edges[axis][1] = high / (high > 0.0f ? nearest : farthest);
+		}
+		const auto pixel = [](float i_Edge, int i_Size)
+		{ return (0.5 * static_cast<double>(std::clamp(i_Edge, -2.0f, 2.0f)) + 0.5) * i_Size; };
+		all |= QRectF(QPointF(pixel(edges[0][0], i_rFrame.width()), pixel(edges[1][0], i_rFrame.height())),
+		    QPointF(pixel(edges[0][1], i_rFrame.width()), pixel(edges[1][1], i_rFrame.height())));
+	}
+	return all.toAlignedRect() & frame;
+}
+
 } // namespace OrlexGraphics

@@ -85,4 +85,9 @@ struct VPickFrustum
 /// @param i_rRectangle in pixels from the lower left corner of a frame of this size
 VPickFrustum MakePickFrustum(const QMatrix4x4& i_rViewProjection, const QRect& i_rRectangle, const QSize& i_rFrame);
 
+/// The pixels of a frame of this size that spheres lie within, from the lower left corner. All of them if a sphere
+/// reaches behind the eye.
+QRect ScreenRectangle(
+    const std::vector<QVector4D>& i_rSpheres, const QMatrix4x4& i_rViewProjection, const QSize& i_rFrame);
+
 } // namespace OrlexGraphics

@@ -37,7 +37,7 @@ void VSelectionRegistry::Reset()
 	m_Excluded.clear();
 	m_BoundsById.clear();
 	m_PickBounds.clear();
-	m_bFlagged = false;
+	m_FlaggedIds.clear();
 	// Others may still read those of the frame before.
 	m_pPlaces = std::make_shared<VItemPlaces>();
 
@@ -87,7 +87,9 @@ CoreGraphics::VSelectionId VSelectionRegistry::GetId(const NVX::ISelectionItem& 
 	const auto flags = m_Flags.find(i_rItem);
 	if (id == 0 || flags == m_Flags.end())
 		return CoreGraphics::MakeSelectionId(id);
-	m_bFlagged = true;
+	// The handles are not drawn in the id frame: they show by their colour.
+	if (i_rItem.m_Kind != ESelectionManipulatorHandle)
+		m_FlaggedIds.push_back(id);
 	return CoreGraphics::MakeSelectionId(id | flags->second);
 }
 
@@ -155,15 +157,31 @@ void VSelectionRegistry::Exclude(std::uint32_t i_Id)
 	m_Excluded[id] = true;
 }
 
+const QVector4D* VSelectionRegistry::FindPickBound(const NVX::ISelectionItem& i_rItem) const
+{
+	const auto pick = m_PickBounds.find(i_rItem);
+	return pick == m_PickBounds.end() ? GetItemBound(i_rItem) : &pick->second;
+}
+
+bool VSelectionRegistry::GetFlaggedBounds(std::vector<QVector4D>& o_rBounds) const
+{
+	o_rBounds.clear();
+	for (const std::uint32_t id : m_FlaggedIds)
+	{
+		const QVector4D* const pBound = FindPickBound(m_Items.at(id));
+		if (!pBound)
+			return false;
+		o_rBounds.push_back(*pBound);
+	}
+	return true;
+}
+
 void VSelectionRegistry::ExcludeOutside(const VPickFrustum& i_rFrustum)
 {
 	if (m_BoundsById.empty())
 		for (const auto& [rItem, rBound] : m_pPlaces->m_Bounds)
 			if (const auto id = m_Ids.find(rItem); id != m_Ids.end())
-			{
-				const auto pick = m_PickBounds.find(rItem);
-				m_BoundsById.emplace_back(id->second, pick == m_PickBounds.end() ? rBound : pick->second);
-			}
+				m_BoundsById.emplace_back(id->second, *FindPickBound(rItem));
 	for (const auto& [id, rBound] : m_BoundsById)
 		if (!i_rFrustum.Contains(rBound))
 			Exclude(id);

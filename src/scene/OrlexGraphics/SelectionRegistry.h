@@ -85,10 +85,15 @@ public:
 	/// Leaves out what lies outside of a pick rectangle, too.
 	void ExcludeOutside(const VPickFrustum& i_rFrustum);
 
-	/// Whether something in the frame is selected or preselected.
-	bool HasFlagged() const { return m_bFlagged; }
+	/// Whether something that is drawn in the id frame is selected or preselected.
+	bool HasFlagged() const { return !m_FlaggedIds.empty(); }
+	/// What encloses all of that. False if something has no bound.
+	bool GetFlaggedBounds(std::vector<QVector4D>& o_rBounds) const;
 
 private:
+	/// Null if the item has none.
+	const QVector4D* FindPickBound(const NVX::ISelectionItem& i_rItem) const;
+
 	std::map<std::uint32_t, NVX::ISelectionItem> m_Items;
 	std::unordered_map<NVX::ISelectionItem, std::uint32_t, VSelectionItemHash> m_Ids;
 	std::unordered_map<std::uint32_t, std::string> m_Names;
@@ -102,7 +107,7 @@ private:
 	std::unordered_map<NVX::ISelectionItem, QVector4D, VSelectionItemHash> m_PickBounds;
 	/// The bounds by id, once a pick has asked for them.
 	std::vector<std::pair<std::uint32_t, QVector4D>> m_BoundsById;
-	bool m_bFlagged = false;
+	std::vector<std::uint32_t> m_FlaggedIds;
 	std::uint32_t m_NextId = 1;
 };
 
