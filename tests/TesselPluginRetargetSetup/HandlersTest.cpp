@@ -109,6 +109,19 @@ TEST_F(Handlers, OnlyWhatIsTypedReachesTheTarget)
 	EXPECT_EQ(TakeLog(), "");
 }
 
+TEST_F(Handlers, WhatIsSavedHoldsWhatWasJustTyped)
+{
+	OpenWithTargets();
+	Select(NVX::ESelectionTarget, 0);
+	EXPECT_EQ(Parameter("TargetWeight").SetValueText("30"), "");
+	EXPECT_EQ(Parameter("TargetScale").SetValueText("2"), "");
+	m_pWidget->ApplyParameters();
+	EXPECT_EQ(Target().m_Targets[0].m_Weight, 30.0);
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 2.0);
+	Run();
+	EXPECT_EQ(m_Changes, 2) << "and is not applied again";
+}
+
 TEST_F(Handlers, WhatTheDocumentRefusesIsShownAsItIsAgain)
 {
 	OpenWithTargets();

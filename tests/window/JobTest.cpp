@@ -177,8 +177,9 @@ TEST_F(Window, TheWholeJob)
 
 	rOperator.ClickRow("targets", 0);
 	EXPECT_EVENTUALLY(rOperator.Property("removeTarget", "enabled").toBool());
-	rOperator.Fill("TargetWeight", "7");
-	rOperator.Click("save");
+	// Saved with the field still open.
+	rOperator.Replace("TargetWeight", "7");
+	rOperator.Key(Qt::Key_S, Qt::ControlModifier);
 	edits += {"--weight", "0=7"};
 	const QByteArray saved = CommandLine(edits);
 	EXPECT_EVENTUALLY(Content("job.qrr") == saved);

@@ -71,6 +71,12 @@ void VRetargetSetupWidget::ApplyStoredValues()
 	}
 }
 
+void VRetargetSetupWidget::ApplyParameters()
+{
+	OnTargetScaleChanged();
+	OnTargetParametersChanged();
+}
+
 void VRetargetSetupWidget::OnSourceSkeletonChanged()
 {
 	if (!m_Parameters.m_pSourceSkeleton->HasValue())

@@ -50,6 +50,10 @@ public:
 
 	bool ExecuteCommand(const std::string& i_rCommand) override;
 
+	/// Brings to the document at once the scale and the target's values that stand in the parameters; otherwise it
+	/// hears of it through the dispatcher.
+	Q_INVOKABLE void ApplyParameters();
+
 	/// Below it something of the panel would be cut off.
 	QSize minimumSizeHint() const override;
 

@@ -2,6 +2,7 @@ import QtQuick 2.15
 import QtQuick.Controls 2.15
 import QtQuick.Dialogs 1.3
 import QtQuick.Layouts 1.15
+import QtQuick.Window 2.15
 import Orlex.Controls 1.0
 import Orlex.Selection 1.0
 import Orlex.Tessel.Parameters 1.0
@@ -38,8 +39,19 @@ Rectangle {
 		return url.toString().endsWith(".qrx")
 	}
 
+	// What stands in a field that is still being typed into is part of what is saved.
+	function commitField() {
+		const field = retargetSetup.Window.activeFocusItem
+		if (field && field.editingFinished !== undefined) {
+			retargetSetup.forceActiveFocus()
+			field.forceActiveFocus()
+		}
+		contextQuickWidget.ApplyParameters()
+	}
+
 	// Legacy files are only read: what came from one is saved under a new name.
 	function save() {
+		commitField()
 		if (isLegacy(currentTargetSubjectURL))
 			saveDialog.open()
 		else
@@ -88,6 +100,7 @@ Rectangle {
 			if (fileUrls.length !== 1)
 				return
 			const url = fileUrls[0]
+			retargetSetup.commitField()
 			ContextRetargetSetup.SaveTargetSubjectURL(url)
 			if (!retargetSetup.isLegacy(url))
 				retargetSetup.currentTargetSubjectURL = url
