@@ -101,6 +101,9 @@ struct VBench
 		    std::make_shared<InMemoryHost::VDispatcher>(), false);
 		m_pScene->m_Count = i_Count;
 		m_Renderer.Initialise();
+		// What is measured is the walk, not what else a scene shows.
+		m_Renderer.m_Input.m_Options.m_bFloorGrid = false;
+		m_Renderer.m_Input.m_Options.m_bGlobalAxis = false;
 		m_Renderer.m_Input.m_Camera.SetSize(c_Size);
 		m_Renderer.SetScene(m_pScene);
 		m_Renderer.SetSize(c_Size);
@@ -132,6 +135,13 @@ void DrawFrame(benchmark::State& io_rState, VBench& io_rBench)
 void ClearedFrame(benchmark::State& io_rState)
 {
 	VBench bench(0, 0);
+	DrawFrame(io_rState, bench);
+}
+
+void FloorFrame(benchmark::State& io_rState)
+{
+	VBench bench(0, 0);
+	bench.m_Renderer.m_Input.m_Options.m_bFloorGrid = true;
 	DrawFrame(io_rState, bench);
 }
 
@@ -183,6 +193,7 @@ void Items(benchmark::internal::Benchmark* io_pBenchmark)
 }
 
 BENCHMARK(ClearedFrame)->Apply(Items);
+BENCHMARK(FloorFrame)->Apply(Items);
 BENCHMARK(Frame)->Apply(Items);
 BENCHMARK(OutlinedFrame)->Apply(Items);
 BENCHMARK(HoverPick)->Apply(Items);
@@ -201,5 +212,6 @@ int main(int i_Count, char** i_ppArguments)
 		std::puts("No OpenGL here, nothing is measured.");
 		return 0;
 	}
-	return Ratios::Main(i_Count, i_ppArguments, {{"HoverPick", "ClearedFrame", 2.0}, {"Frame", "ClearedFrame", 10.0}});
+	return Ratios::Main(i_Count, i_ppArguments,
+	    {{"HoverPick", "ClearedFrame", 2.0}, {"Frame", "ClearedFrame", 10.0}, {"OutlinedFrame", "ClearedFrame", 10.0}});
 }
