@@ -1,18 +1,9 @@
-#include "../CoreGraphics/OffscreenContext.h"
+#include "RenderTypeFixture.h"
 
-#include "CoreGraphics/CameraController.h"
-#include "CoreGraphics/RenderContext.h"
-#include "CoreGraphics/ShaderLibrary.h"
-#include "InMemoryHost/Selection.h"
 #include "OrlexGraphics/RenderManipulator.h"
-#include "OrlexGraphics/SceneOptions.h"
-#include "OrlexGraphics/SelectionRegistry.h"
-
-#include <QColor>
-#include <QOpenGLFramebufferObject>
 
 #include <algorithm>
-#include <array>
+#include <cstdlib>
 
 using namespace OrlexGraphics;
 
@@ -28,75 +19,42 @@ constexpr VColour c_Green{51, 255, 51};
 constexpr VColour c_Blue{51, 51, 255};
 constexpr VColour c_Yellow{255, 255, 0};
 
-class RenderManipulator : public GraphicsTest::InBothDialects
+class RenderManipulator : public VRenderTypeTest
 {
 protected:
+	RenderManipulator() : VRenderTypeTest(QSize(c_Width, c_Height)) {}
+
 	void SetUp() override
 	{
-		InBothDialects::SetUp();
-		m_Library.InitialiseGL();
-		m_Context3D.Initialise();
-		m_Context3D.ResetState();
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Width, c_Height, QOpenGLFramebufferObject::Depth);
-		m_Context3D.BindFramebuffer(m_pTarget.get());
+		VRenderTypeTest::SetUp();
 		m_pManipulator = std::make_unique<VRenderManipulator>(m_Library, m_pRegistry, m_pSelection);
 		m_pManipulator->SetVisible(true);
 		// From +X, with Y to the right and Z up, the origin in the middle of the picture.
 		m_Camera.m_Type = CoreGraphics::ECameraRight;
-		m_Camera.SetSize(QSize(c_Width, c_Height));
 	}
 
-	void DrawFrame(std::uint32_t i_Mode = CoreGraphics::ERenderNormal, std::uint32_t i_Pass = EPassOverlay)
+	bool DrawFrame(std::uint32_t i_Mode = CoreGraphics::ERenderNormal, std::uint32_t i_Pass = EPassOverlay)
 	{
-		m_pRegistry->SetSelection(m_pSelection->Selection().Items(), m_pSelection->PreSelection().Items());
-		m_pRegistry->Reset();
-		m_pRegistry->ClearExcluded();
+		BeginFrame();
 		m_pManipulator->AllocateIds();
 		m_pManipulator->Synchronise();
-		m_Camera.Update();
-		m_Camera.Apply(m_Context3D);
-		m_Context3D.m_Mode = i_Mode;
-		m_Context3D.SetClearColour(i_Mode == CoreGraphics::ERenderNormal ? QColor(40, 40, 40) : Qt::black);
-		m_Context3D.ClearBuffers(true, true);
-		m_pManipulator->Render(m_Context3D, m_Options, i_Pass);
-		m_Context3D.ReadPixels(QRect(0, 0, c_Width, c_Height), m_Pixels);
-	}
-
-	VColour Pixel(int i_X, int i_Y) const
-	{
-		const auto first = m_Pixels.begin() + 4 * (i_Y * c_Width + i_X);
-		return {first[0], first[1], first[2]};
+		return DrawPass(*m_pManipulator, i_Mode, i_Pass);
 	}
 
 	/// Pixels from the lower left corner that hold a colour, within one step of a byte.
-	QRect Extent(const VColour& i_rColour) const
+	QRect ExtentOf(const VColour& i_rColour) const
 	{
-		QRect extent;
-		for (int y = 0; y < c_Height; ++y)
-		{
-			for (int x = 0; x < c_Width; ++x)
-			{
-				const VColour pixel = Pixel(x, y);
-				if (std::equal(pixel.begin(), pixel.end(), i_rColour.begin(),
-				        [](int i_A, int i_B) { return std::abs(i_A - i_B) <= 1; }))
-					extent |= QRect(x, y, 1, 1);
-			}
-		}
-		return extent;
+		return Extent(
+		    [&](const VColour& i_rPixel)
+		    {
+			    return std::equal(i_rPixel.begin(), i_rPixel.end(), i_rColour.begin(),
+			        [](int i_A, int i_B) { return std::abs(i_A - i_B) <= 1; });
+		    });
 	}
 
 	void PointAt(const VManipulatorHandle& i_rHandle) { m_pSelection->PreSelection().Replace({HandleItem(i_rHandle)}); }
 
-	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
-	    std::make_shared<InMemoryHost::VSelectionManager>();
-	const std::shared_ptr<VSelectionRegistry> m_pRegistry = std::make_shared<VSelectionRegistry>();
-	CoreGraphics::VShaderLibrary m_Library;
-	CoreGraphics::VRenderContext m_Context3D;
-	CoreGraphics::VCameraController m_Camera;
-	VSceneOptions m_Options;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 	std::unique_ptr<VRenderManipulator> m_pManipulator;
-	std::vector<std::uint8_t> m_Pixels;
 };
 INSTANTIATE_IN_BOTH_DIALECTS(RenderManipulator);
 
@@ -132,7 +90,7 @@ TEST_P(RenderManipulator, HandlesKeepTheirSizeOnTheScreen)
 		DrawFrame();
 		// A shaft from 10 to 90 and a head to 120 pixels, whose tip is thinner than a pixel; the head of X covers the
 		// beginning.
-		const QRect green = Extent(c_Green), blue = Extent(c_Blue);
+		const QRect green = ExtentOf(c_Green), blue = ExtentOf(c_Blue);
 		EXPECT_NEAR(green.right() - c_Width / 2, 120 * rRow.m_Factor, 3.5);
 		EXPECT_NEAR(green.left() - c_Width / 2, 10 * rRow.m_Factor, 3.5);
 		EXPECT_NEAR(green.height(), 20 * rRow.m_Factor, 2.5);
@@ -157,7 +115,7 @@ TEST_P(RenderManipulator, ModesChooseTheHandles)
 		SCOPED_TRACE(rRow.m_Mask);
 		m_pManipulator->SetModeMask(rRow.m_Mask);
 		DrawFrame();
-		const QRect blue = Extent(c_Blue);
+		const QRect blue = ExtentOf(c_Blue);
 		EXPECT_EQ(blue.isEmpty(), rRow.m_Blue.isEmpty());
 		EXPECT_NEAR(blue.left(), rRow.m_Blue.left(), 3);
 		EXPECT_NEAR(blue.right(), rRow.m_Blue.right(), 3);
@@ -168,49 +126,37 @@ TEST_P(RenderManipulator, ModesChooseTheHandles)
 
 TEST_P(RenderManipulator, DrawsOnlyWhereItMay)
 {
-	const auto draw = [&](std::uint32_t i_Mode, std::uint32_t i_Pass)
-	{
-		DrawFrame(i_Mode, i_Pass);
-		return !std::equal(m_Pixels.begin() + 4, m_Pixels.end(), m_Pixels.begin());
-	};
-	EXPECT_TRUE(draw(CoreGraphics::ERenderNormal, EPassOverlay));
-	EXPECT_TRUE(draw(CoreGraphics::ERenderPick, EPassOverlay));
-	EXPECT_FALSE(draw(CoreGraphics::ERenderId, EPassOverlay));
-	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassOpaque));
-	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassTransparent));
+	EXPECT_TRUE(DrawFrame(CoreGraphics::ERenderNormal, EPassOverlay));
+	EXPECT_TRUE(DrawFrame(CoreGraphics::ERenderPick, EPassOverlay));
+	EXPECT_FALSE(DrawFrame(CoreGraphics::ERenderId, EPassOverlay));
+	EXPECT_FALSE(DrawFrame(CoreGraphics::ERenderNormal, EPassOpaque));
+	EXPECT_FALSE(DrawFrame(CoreGraphics::ERenderNormal, EPassTransparent));
 	m_Options.m_bManipulator = false;
-	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassOverlay));
+	EXPECT_FALSE(DrawFrame(CoreGraphics::ERenderNormal, EPassOverlay));
 	m_Options.m_bManipulator = true;
 	m_Options.m_OverlayCamera = "camera";
-	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassOverlay));
+	EXPECT_FALSE(DrawFrame(CoreGraphics::ERenderNormal, EPassOverlay));
 	m_Options.m_OverlayCamera.clear();
 	m_pManipulator->SetVisible(false);
-	EXPECT_FALSE(draw(CoreGraphics::ERenderNormal, EPassOverlay));
+	EXPECT_FALSE(DrawFrame(CoreGraphics::ERenderNormal, EPassOverlay));
 }
 
 TEST_P(RenderManipulator, PicksGiveTheHandle)
 {
-	const auto itemAt = [&](int i_X, int i_Y)
-	{
-		const VColour pixel = Pixel(i_X, i_Y);
-		NVX::ISelectionItem item;
-		m_pRegistry->ResolveId(static_cast<std::uint32_t>(pixel[0] | pixel[1] << 8 | pixel[2] << 16), item);
-		return item;
-	};
 	DrawFrame(CoreGraphics::ERenderPick);
-	EXPECT_EQ(itemAt(300, 150), HandleItem({EManipulatorArrow, 1}));
-	EXPECT_EQ(itemAt(200, 250), HandleItem({EManipulatorArrow, 2}));
+	EXPECT_EQ(ItemAt(300, 150), HandleItem({EManipulatorArrow, 1}));
+	EXPECT_EQ(ItemAt(200, 250), HandleItem({EManipulatorArrow, 2}));
 	// The ring about X stands upright before the eye.
 	// At a distance of 50 pixels, aslant.
-	EXPECT_EQ(itemAt(200 - 36, 150 - 36), HandleItem({EManipulatorRing, 0}));
-	EXPECT_EQ(itemAt(100, 250), NVX::ISelectionItem());
+	EXPECT_EQ(ItemAt(200 - 36, 150 - 36), HandleItem({EManipulatorRing, 0}));
+	EXPECT_EQ(ItemAt(100, 250), NVX::ISelectionItem());
 
 	// What was found is left out of the next layer.
 	m_pRegistry->Exclude(m_pRegistry->Allocate(HandleItem({EManipulatorArrow, 1})));
-	m_Context3D.ClearBuffers(true, true);
-	m_pManipulator->Render(m_Context3D, m_Options, EPassOverlay);
-	m_Context3D.ReadPixels(QRect(0, 0, c_Width, c_Height), m_Pixels);
-	EXPECT_EQ(itemAt(300, 150), NVX::ISelectionItem());
+	m_Render.ClearBuffers(true, true);
+	m_pManipulator->Render(m_Render, m_Options, EPassOverlay);
+	Read();
+	EXPECT_EQ(ItemAt(300, 150), NVX::ISelectionItem());
 }
 
 TEST_P(RenderManipulator, APressDragsTheHandleThatIsPointedAt)

@@ -1,15 +1,6 @@
-#include "../CoreGraphics/OffscreenContext.h"
+#include "RenderTypeFixture.h"
 
-#include "CoreGraphics/CameraController.h"
-#include "CoreGraphics/RenderContext.h"
-#include "CoreGraphics/ShaderLibrary.h"
-#include "InMemoryHost/Selection.h"
 #include "OrlexGraphics/RenderVolumeManipulator.h"
-#include "OrlexGraphics/SceneOptions.h"
-#include "OrlexGraphics/SelectionRegistry.h"
-
-#include <QColor>
-#include <QOpenGLFramebufferObject>
 
 #include <algorithm>
 #include <cmath>
@@ -36,67 +27,34 @@ CoreGraphics::VCameraController MakeCamera(std::uint32_t i_Type, bool i_bYUp = f
 	return camera;
 }
 
-class VolumeManipulator : public GraphicsTest::InBothDialects
+class VolumeManipulator : public VRenderTypeTest
 {
 protected:
+	VolumeManipulator() : VRenderTypeTest(QSize(c_Width, c_Height)) {}
+
 	void SetUp() override
 	{
-		InBothDialects::SetUp();
-		m_Library.InitialiseGL();
-		m_Render.Initialise();
-		m_Render.ResetState();
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Width, c_Height, QOpenGLFramebufferObject::Depth);
-		m_Render.BindFramebuffer(m_pTarget.get());
+		VRenderTypeTest::SetUp();
+		m_Camera = MakeCamera(CoreGraphics::ECameraTop);
 		m_pManipulator = std::make_unique<VRenderVolumeManipulator>(
 		    m_Library, m_pRegistry, m_pSelection, "Volume", QVector3D(1.0f, 0.0f, 1.0f), c_Volume);
 	}
 
-	/// Whether anything was drawn.
 	bool Draw(std::uint32_t i_Mode = CoreGraphics::ERenderNormal, std::uint32_t i_Pass = EPassOverlay)
 	{
-		m_pRegistry->SetSelection(m_pSelection->Selection().Items(), m_pSelection->PreSelection().Items());
-		m_pRegistry->Reset();
-		m_pRegistry->ClearExcluded();
+		BeginFrame();
 		m_pManipulator->AllocateIds();
 		m_pManipulator->Synchronise();
-		m_Camera.Apply(m_Render);
-		m_Render.m_Mode = i_Mode;
-		m_Render.SetClearColour(Qt::black);
-		m_Render.ClearBuffers(true, true);
-		m_pManipulator->Render(m_Render, m_Options, i_Pass);
-		m_Render.ReadPixels(QRect(0, 0, c_Width, c_Height), m_Pixels);
-		return !std::equal(m_Pixels.begin() + 4, m_Pixels.end(), m_Pixels.begin());
+		return DrawPass(*m_pManipulator, i_Mode, i_Pass);
 	}
 
-	/// From the upper left corner, as the mouse has it.
-	std::uint32_t ColourAt(int i_X, int i_Y) const
-	{
-		const auto first = m_Pixels.begin() + 4 * ((c_Height - 1 - i_Y) * c_Width + i_X);
-		return static_cast<std::uint32_t>(first[0] | first[1] << 8 | first[2] << 16);
-	}
-
-	NVX::ISelectionItem ItemAt(int i_X, int i_Y) const
-	{
-		NVX::ISelectionItem item;
-		m_pRegistry->ResolveId(ColourAt(i_X, i_Y), item);
-		return item;
-	}
-
-	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
-	    std::make_shared<InMemoryHost::VSelectionManager>();
-	const std::shared_ptr<VSelectionRegistry> m_pRegistry = std::make_shared<VSelectionRegistry>();
-	CoreGraphics::VShaderLibrary m_Library;
-	CoreGraphics::VRenderContext m_Render;
-	CoreGraphics::VCameraController m_Camera = MakeCamera(CoreGraphics::ECameraTop);
-	VSceneOptions m_Options;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 	std::unique_ptr<VRenderVolumeManipulator> m_pManipulator;
-	std::vector<std::uint8_t> m_Pixels;
 };
 INSTANTIATE_IN_BOTH_DIALECTS(VolumeManipulator);
 
-constexpr std::uint32_t c_Magenta = 0xff00ff;
-constexpr std::uint32_t c_Yellow = 0x00ffff;
+constexpr std::array<int, 3> c_Magenta{255, 0, 255};
+constexpr std::array<int, 3> c_Yellow{255, 255, 0};
+constexpr std::array<int, 3> c_Nothing{40, 40, 40};
 
 } // namespace
 
@@ -177,20 +135,20 @@ TEST_P(VolumeManipulator, DrawsItsBoxAndHandlesWhenShown)
 	m_pManipulator->SetVisible(true);
 	EXPECT_TRUE(Draw());
 	// From above: X from 150 to 250 pixels, Y from 50 to 250; an arrow of 48 pixels out of each side, none at the eye.
-	EXPECT_EQ(ColourAt(280, 150), c_Magenta);
-	EXPECT_EQ(ColourAt(120, 150), c_Magenta);
-	EXPECT_EQ(ColourAt(200, 20), c_Magenta);
-	EXPECT_EQ(ColourAt(200, 280), c_Magenta);
-	EXPECT_EQ(ColourAt(250, 50), c_Magenta);
-	EXPECT_EQ(ColourAt(200, 150), c_Magenta);
-	EXPECT_EQ(ColourAt(200, 170), 0u);
-	EXPECT_EQ(ColourAt(300, 150), 0u);
+	EXPECT_EQ(Pixel(280, 149), c_Magenta);
+	EXPECT_EQ(Pixel(120, 149), c_Magenta);
+	EXPECT_EQ(Pixel(200, 279), c_Magenta);
+	EXPECT_EQ(Pixel(200, 19), c_Magenta);
+	EXPECT_EQ(Pixel(250, 249), c_Magenta);
+	EXPECT_EQ(Pixel(200, 149), c_Magenta);
+	EXPECT_EQ(Pixel(200, 129), c_Nothing);
+	EXPECT_EQ(Pixel(300, 149), c_Nothing);
 
 	EXPECT_TRUE(Draw(CoreGraphics::ERenderPick));
-	EXPECT_EQ(ItemAt(280, 150), m_pManipulator->HandleItem({EVolumeFace, 0}));
-	EXPECT_EQ(ItemAt(200, 280), m_pManipulator->HandleItem({EVolumeFace, 3}));
-	EXPECT_EQ(ItemAt(250, 50), m_pManipulator->HandleItem({EVolumeCorner, 0}));
-	EXPECT_EQ(ItemAt(200, 150), m_pManipulator->HandleItem({EVolumeCentre, 0}));
+	EXPECT_EQ(ItemAt(280, 149), m_pManipulator->HandleItem({EVolumeFace, 0}));
+	EXPECT_EQ(ItemAt(200, 19), m_pManipulator->HandleItem({EVolumeFace, 3}));
+	EXPECT_EQ(ItemAt(250, 249), m_pManipulator->HandleItem({EVolumeCorner, 0}));
+	EXPECT_EQ(ItemAt(200, 149), m_pManipulator->HandleItem({EVolumeCentre, 0}));
 
 	EXPECT_FALSE(Draw(CoreGraphics::ERenderId));
 	EXPECT_FALSE(Draw(CoreGraphics::ERenderNormal, EPassOpaque));
@@ -211,7 +169,7 @@ TEST_P(VolumeManipulator, APressDragsTheHandleThatIsPointedAt)
 	m_pManipulator->SetVisible(true);
 	EXPECT_TRUE(m_pManipulator->IsHovered());
 	Draw();
-	EXPECT_EQ(ColourAt(280, 150), c_Yellow);
+	EXPECT_EQ(Pixel(280, 149), c_Yellow);
 
 	m_pManipulator->Press(m_Camera, {280, 150});
 	EXPECT_TRUE(m_pManipulator->IsDragging());

@@ -1,0 +1,110 @@
+#pragma once
+
+#include "../CoreGraphics/OffscreenContext.h"
+
+#include "CoreGraphics/CameraController.h"
+#include "CoreGraphics/RenderContext.h"
+#include "CoreGraphics/ShaderLibrary.h"
+#include "InMemoryHost/Selection.h"
+#include "OrlexGraphics/IRenderType.h"
+#include "OrlexGraphics/SceneOptions.h"
+#include "OrlexGraphics/SelectionRegistry.h"
+
+#include <QColor>
+#include <QOpenGLFramebufferObject>
+
+#include <array>
+#include <cstdint>
+#include <cstring>
+#include <memory>
+#include <vector>
+
+/// One render type, drawn without a scene.
+class VRenderTypeTest : public GraphicsTest::InBothDialects
+{
+protected:
+	using VColour = std::array<int, 3>;
+
+	explicit VRenderTypeTest(const QSize& i_rSize) : m_Size(i_rSize) { m_Camera.SetSize(i_rSize); }
+
+	void SetUp() override
+	{
+		InBothDialects::SetUp();
+		m_Library.InitialiseGL();
+		m_Render.Initialise();
+		m_Render.ResetState();
+		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(m_Size, QOpenGLFramebufferObject::Depth);
+		m_Render.BindFramebuffer(m_pTarget.get());
+	}
+
+	/// A frame update begins.
+	void BeginFrame()
+	{
+		m_pRegistry->SetSelection(m_pSelection->Selection().Items(), m_pSelection->PreSelection().Items());
+		m_pRegistry->Reset();
+		m_pRegistry->ClearExcluded();
+	}
+
+	/// One pass over a background, which is black for ids.
+	/// @return whether anything was drawn
+	bool DrawPass(OrlexGraphics::IRenderType& io_rType, std::uint32_t i_Mode, std::uint32_t i_Pass)
+	{
+		m_Camera.Update();
+		m_Camera.Apply(m_Render);
+		m_Render.SetYUp(m_Camera.m_bYUp);
+		m_Render.m_Mode = i_Mode;
+		m_Render.SetClearColour(i_Mode == CoreGraphics::ERenderNormal ? m_Background : Qt::black);
+		m_Render.ClearBuffers(true, true);
+		io_rType.Render(m_Render, m_Options, i_Pass);
+		Read();
+		EXPECT_EQ(m_Render.m_Viewport, QRect(QPoint(), m_Size));
+		// Each pixel is like the one before it.
+		return std::memcmp(m_Pixels.data(), m_Pixels.data() + 4, m_Pixels.size() - 4) != 0;
+	}
+
+	void Read() { m_Render.ReadPixels(QRect(QPoint(), m_Size), m_Pixels); }
+
+	/// From the lower left corner.
+	VColour Pixel(int i_X, int i_Y) const
+	{
+		const std::uint8_t* const pPixel = m_Pixels.data() + 4 * (i_Y * m_Size.width() + i_X);
+		return {pPixel[0], pPixel[1], pPixel[2]};
+	}
+
+	/// Where the pixels are of which it holds.
+	template <typename TCondition>
+	QRect Extent(const TCondition& i_rCondition) const
+	{
+		QRect extent;
+		for (int y = 0; y < m_Size.height(); ++y)
+		{
+			for (int x = 0; x < m_Size.width(); ++x)
+			{
+				if (i_rCondition(Pixel(x, y)))
+					extent |= QRect(x, y, 1, 1);
+			}
+		}
+		return extent;
+	}
+
+	NVX::ISelectionItem ItemAt(int i_X, int i_Y) const
+	{
+		const VColour pixel = Pixel(i_X, i_Y);
+		NVX::ISelectionItem item;
+		m_pRegistry->ResolveId(static_cast<std::uint32_t>(pixel[0] | pixel[1] << 8 | pixel[2] << 16), item);
+		return item;
+	}
+
+	const QSize m_Size;
+	QColor m_Background{40, 40, 40};
+	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
+	    std::make_shared<InMemoryHost::VSelectionManager>();
+	const std::shared_ptr<OrlexGraphics::VSelectionRegistry> m_pRegistry =
+	    std::make_shared<OrlexGraphics::VSelectionRegistry>();
+	CoreGraphics::VShaderLibrary m_Library;
+	CoreGraphics::VRenderContext m_Render;
+	CoreGraphics::VCameraController m_Camera;
+	OrlexGraphics::VSceneOptions m_Options;
+	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
+	std::vector<std::uint8_t> m_Pixels;
+};
