@@ -32,9 +32,9 @@ VLogPanel::VLogPanel(VLogModel& i_rModel, QWidget* i_pParent)
 	pLevel->addItem(tr("Warnings and errors"), NVX::ELogWarning);
 	pLevel->addItem(tr("Information"), NVX::ELogInformation);
 	pLevel->addItem(tr("Everything"), NVX::ELogDetail);
-	pLevel->setCurrentIndex(3);
 	connect(pLevel, qOverload<int>(&QComboBox::currentIndexChanged), this,
 	    [this, pLevel] { m_pFilter->SetMaximumLevel(pLevel->currentData().toInt()); });
+	pLevel->setCurrentIndex(pLevel->findData(NVX::ELogWarning));
 
 	m_pCategories->setSizeAdjustPolicy(QComboBox::AdjustToContents);
 	connect(m_pCategories, qOverload<int>(&QComboBox::currentIndexChanged), this,

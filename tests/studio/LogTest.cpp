@@ -99,7 +99,8 @@ TEST_F(Log, IsFilteredAndCopied)
 	auto& rLevel = *panel.findChild<QComboBox*>("LogLevel");
 	auto& rCategory = *panel.findChild<QComboBox*>("LogCategory");
 	auto& rFilter = *panel.findChild<QLineEdit*>("LogFilter");
-	EXPECT_EQ(rTable.model()->rowCount(), 3);
+	// At first what needs no attention is left out.
+	EXPECT_EQ(rTable.model()->rowCount(), 2);
 
 	const struct
 	{
