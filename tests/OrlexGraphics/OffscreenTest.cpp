@@ -1,4 +1,5 @@
 #include "../CoreGraphics/OffscreenContext.h"
+#include "Allocations.h"
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/SelectionId.h"
 #include "OrlexGraphics/FrameRenderer.h"
@@ -10,58 +11,7 @@
 #include <QOpenGLFramebufferObject>
 
 #include <cmath>
-#include <cstdlib>
-#include <new>
 #include <thread>
-
-namespace
-{
-
-thread_local std::size_t g_Allocations = 0;
-
-void* Allocate(std::size_t i_Size)
-{
-	++g_Allocations;
-	if (void* pMemory = std::malloc(i_Size ? i_Size : 1))
-		return pMemory;
-	throw std::bad_alloc();
-}
-
-} // namespace
-
-void* operator new(std::size_t i_Size)
-{
-	return Allocate(i_Size);
-}
-void* operator new[](std::size_t i_Size)
-{
-	return Allocate(i_Size);
-}
-// The software renderer's compiler allocates with these, and frees with those below.
-void* operator new(std::size_t i_Size, const std::nothrow_t&) noexcept
-{
-	return std::malloc(i_Size ? i_Size : 1);
-}
-void* operator new[](std::size_t i_Size, const std::nothrow_t&) noexcept
-{
-	return std::malloc(i_Size ? i_Size : 1);
-}
-void operator delete(void* i_pMemory) noexcept
-{
-	std::free(i_pMemory);
-}
-void operator delete[](void* i_pMemory) noexcept
-{
-	std::free(i_pMemory);
-}
-void operator delete(void* i_pMemory, std::size_t) noexcept
-{
-	std::free(i_pMemory);
-}
-void operator delete[](void* i_pMemory, std::size_t) noexcept
-{
-	std::free(i_pMemory);
-}
 
 namespace
 {
@@ -241,9 +191,9 @@ TEST_P(Offscreen, AllocatesNothingInAFrameThatDoesNotChange)
 	m_pSelection->Selection().Replace({Item(1), Item(2)});
 	for (int i = 0; i < 3; ++i)
 		Frame();
-	const std::size_t before = g_Allocations;
+	const std::size_t before = AllocationCount();
 	m_Renderer.Render(*m_pTarget);
-	const std::size_t first = g_Allocations - before;
+	const std::size_t first = AllocationCount() - before;
 	EXPECT_EQ(first, 0u);
 }
 

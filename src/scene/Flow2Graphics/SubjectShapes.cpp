@@ -17,6 +17,8 @@ namespace
 {
 
 constexpr float c_ShortestBone = 0.01f;
+/// Most bones lie along an axis, at right angles to two others: rounding must not choose between them.
+constexpr float c_Tie = 1e-4f;
 
 /// The axis of a matrix that is furthest from a direction.
 QVector3D FurthestAxis(const QMatrix4x4& i_rMatrix, const QVector3D& i_rDirection)
@@ -26,7 +28,7 @@ QVector3D FurthestAxis(const QMatrix4x4& i_rMatrix, const QVector3D& i_rDirectio
 	for (int axis = 0; axis < 3; ++axis)
 	{
 		const QVector3D column = i_rMatrix.column(axis).toVector3D();
-		if (const float along = std::abs(QVector3D::dotProduct(column, i_rDirection)); along < smallest)
+		if (const float along = std::abs(QVector3D::dotProduct(column, i_rDirection)); along < smallest - c_Tie)
 		{
 			smallest = along;
 			furthest = column;

@@ -1,0 +1,6 @@
+#pragma once
+
+#include <cstddef>
+
+/// How often this thread has asked for memory. Counts in programs that Allocations.cpp is part of.
+std::size_t AllocationCount();
