@@ -1,7 +1,9 @@
 #include "TesselPluginRetargetSetup/RetargetSetupScene.h"
 
+#include "DebugServices/GlobalLog.h"
 #include "Flow2Graphics/FlowSubjectSceneTransform.h"
 #include "Flow2TypesUtils/ParameterSet.h"
+#include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/SkinCache.h"
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
@@ -18,6 +20,10 @@ namespace
 
 /// Among the pose indices of VFlowSubjectSceneTransform.
 constexpr std::uint32_t c_BindPose = 6;
+
+/// Masks of the manipulator. The root moves and turns, all others only turn.
+constexpr std::uint32_t c_AllHandles = 255;
+constexpr std::uint32_t c_Rings = 4;
 
 ISelectionItem TargetSegment(std::size_t i_Index)
 {
@@ -55,6 +61,7 @@ void VRetargetSetupScene::OnShared()
 	SelectionManager()->PreSelection().ChangedSignal().Connect(onSelectionChanged, Dispatcher());
 	SkinCache()->ChangedSignal().Connect(WeakBind(&VRetargetSetupScene::RefreshScene), Dispatcher());
 	m_pRetargetSetup->GetChangedSignal().Connect(WeakBind(&VRetargetSetupScene::OnSetupChanged), Dispatcher());
+	PublishedSignal().Connect(WeakBind(&VRetargetSetupScene::UpdateManipulator), Dispatcher());
 }
 
 void VRetargetSetupScene::OnSetupChanged()
@@ -84,15 +91,75 @@ std::int64_t VRetargetSetupScene::GetSelectedTargetSegment(std::vector<ISelectio
 	return -1;
 }
 
+void VRetargetSetupScene::InitialiseGL()
+{
+	// Manipulator and connections live on when another view begins to show the scene.
+	if (m_bConnected)
+		return;
+	m_bConnected = true;
+	VFlowScene::InitialiseGL();
+	if (RenderManipulator())
+	{
+		RenderManipulator()->BeginSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorPressed));
+		RenderManipulator()->ChangedSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorMoved));
+	}
+	Dispatcher()->Post(
+	    [pWeak = weak_from_this()]
+	    {
+		    if (const auto pScene = pWeak.lock())
+			    static_cast<VRetargetSetupScene&>(*pScene).RefreshScene();
+	    });
+}
+
 void VRetargetSetupScene::OnSelectionChanged()
 {
 	if (!Manipulator())
 		return;
-	std::vector<ISelectionItem> others;
-	const std::int64_t segment = GetSelectedTargetSegment(others);
-	if (segment != -1)
-		GetItemTransform({TargetSegment(std::size_t(segment))}, m_ManipulatorOrigin);
+	UpdateManipulator();
 	RefreshScene();
+}
+
+void VRetargetSetupScene::UpdateManipulator()
+{
+	if (!RenderManipulator() || RenderManipulator()->IsDragging())
+		return;
+	std::vector<ISelectionItem> others;
+	std::int64_t segment = GetSelectedTargetSegment(others);
+	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
+	QMatrix4x4 matrix;
+	// A segment that is not drawn yet has no matrix; it gets one with the frame that draws it.
+	if (segment < 0 || !pSubject || std::size_t(segment) >= pSubject->m_Segments.size()
+	    || pSubject->m_Segments[std::size_t(segment)].m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy
+	    || !GetItemTransform({TargetSegment(std::size_t(segment))}, matrix))
+		segment = -1;
+	const bool bSame =
+	    segment == m_ManipulatedSegment && (segment == -1 || matrix == RenderManipulator()->GivenTransform());
+	m_ManipulatedSegment = segment;
+	if (segment != -1)
+	{
+		RenderManipulator()->SetTransform(matrix);
+		RenderManipulator()->SetModeMask(segment == 0 ? c_AllHandles : c_Rings);
+	}
+	RenderManipulator()->SetVisible(segment != -1);
+	if (!bSame)
+		emit RefreshRequested();
+}
+
+void VRetargetSetupScene::OnManipulatorPressed()
+{
+	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
+	if (!pSubject || std::size_t(m_ManipulatedSegment) >= pSubject->m_Segments.size())
+		return;
+	const VSubjectParametrised::VSegment& rSegment = pSubject->m_Segments[std::size_t(m_ManipulatedSegment)];
+	using VJoint = VSubjectParametrised::VJoint;
+	constexpr std::array<double, 3> c_None{};
+	const bool bTurnsFreely =
+	    rSegment.m_Joint.m_JointType == VJoint::EBall || rSegment.m_Joint.m_JointType == VJoint::EFree;
+	if (!bTurnsFreely || rSegment.m_Joint.m_JointOrientation != c_None || rSegment.m_InversePostRotation != c_None
+	    || rSegment.m_InversePostTranslation != c_None)
+		NVX_LOG("RetargetSetup", NVX::ELogWarning,
+		    "The segment '%1%' does not follow the manipulator exactly: its joint is not a plain ball joint",
+		    rSegment.m_Name);
 }
 
 void VRetargetSetupScene::ComputeJointFrame(
@@ -113,8 +180,14 @@ void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
 	VSubjectParametrised subject = *target.m_pParametrised;
 	std::vector<ISelectionItem> others;
 	// No segment, -1, is beyond all segments.
-	RetargetSetup::MoveSegment(subject, std::size_t(GetSelectedTargetSegment(others)), i_rMatrix, m_ManipulatorOrigin,
-	    m_pRetargetSetup->JointSymmetry(),
+	const auto segment = std::size_t(GetSelectedTargetSegment(others));
+	QMatrix4x4 parent;
+	if (segment < target.m_pSubject->m_Segments.size())
+		if (const std::uint32_t index = target.m_pSubject->m_Segments[segment].m_ParentSegmentIndex;
+		    index != CoreOrlexTypes::c_NoParent && !GetItemTransform({TargetSegment(index)}, parent))
+			return;
+	const QMatrix4x4 origin = RenderManipulator() ? RenderManipulator()->GivenTransform() : i_rMatrix;
+	RetargetSetup::MoveSegment(subject, segment, i_rMatrix, origin, m_pRetargetSetup->JointSymmetry(),
 	    [&](std::size_t i_SegmentIndex)
 	    {
 		    QMatrix4x4 frame;

@@ -36,6 +36,9 @@ public:
 	/// Shows what the document has now.
 	void RefreshScene();
 
+	/// Connects the manipulator, once.
+	void InitialiseGL() override;
+
 	void OnSelectionChanged();
 
 	/// Poses the selected target segment, and with joint symmetry the one on the other side.
@@ -55,11 +58,17 @@ protected:
 
 private:
 	void OnSetupChanged();
+	/// Shows the manipulator where the selected target segment stands in the last frame, or hides it. Not while it is
+	/// dragged.
+	void UpdateManipulator();
+	/// Tells of joints that cannot take the pose of the manipulator as it is.
+	void OnManipulatorPressed();
 
 	const std::shared_ptr<VRetargetSetup> m_pRetargetSetup;
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
 	/// Makes what is shown of the document's frames.
 	std::shared_ptr<Flow2Graphics::VFlowSubjectSceneTransform> m_pSubjectTransform;
-	/// Where the manipulator stood when its segment was selected.
-	QMatrix4x4 m_ManipulatorOrigin;
+	bool m_bConnected = false;
+	/// -1 while the manipulator is hidden.
+	std::int64_t m_ManipulatedSegment = -1;
 };
