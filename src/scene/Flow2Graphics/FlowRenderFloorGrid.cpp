@@ -5,31 +5,35 @@
 namespace Flow2Graphics
 {
 
+namespace
+{
+
+/// Nothing for extents without an area.
+std::optional<OrlexGraphics::VFloor> FloorOf(const std::array<std::int32_t, 4>& i_rExtents)
+{
+	const auto [minX, maxX, minRow, maxRow] = i_rExtents;
+	if (minX >= maxX || minRow >= maxRow)
+		return {};
+	return OrlexGraphics::VFloor{minX, minRow, maxX, maxRow};
+}
+
+} // namespace
+
 VFlowRenderFloorGrid::VFlowRenderFloorGrid(std::shared_ptr<OrlexGraphics::VRenderFloorGrid> i_pPartner)
     : m_pPartner(std::move(i_pPartner)), m_Floor(Flow2TypesUtils::FlowFloorItem::c_pName),
-      m_SceneTransform(Flow2TypesUtils::FlowSubjectSceneTransformItem::c_pName)
+      m_Arrangement(Flow2TypesUtils::FlowSubjectSceneTransformItem::c_pName)
 {
 }
 
 void VFlowRenderFloorGrid::UpdateStatic(const TesselPluginInterface::IFlowFrame& i_rFrame)
 {
-	m_Floor.Update(i_rFrame);
-	m_SceneTransform.Update(i_rFrame);
-	if (const std::uint64_t generation = m_Floor.Generation() + m_SceneTransform.Generation();
-	    generation != m_Generation)
-		m_Generation = generation;
-	else
+	// Both have to look at the frame.
+	const bool bFloorChanged = m_Floor.Update(i_rFrame);
+	if (!m_Arrangement.Update(i_rFrame) && !bFloorChanged)
 		return;
-	const auto* const pExtents = m_Floor.Value() ? &m_Floor.Value()->m_Extents
-	    : m_SceneTransform.Value()               ? &m_SceneTransform.Value()->m_Extents
-	                                             : nullptr;
-	if (!pExtents)
-		return;
-	OrlexGraphics::VFloor floor;
-	floor.m_X0 = (*pExtents)[0];
-	floor.m_X1 = (*pExtents)[1];
-	floor.m_Y0 = (*pExtents)[2];
-	floor.m_Y1 = (*pExtents)[3];
+	std::optional<OrlexGraphics::VFloor> floor = m_Floor.Value() ? FloorOf(m_Floor.Value()->m_Extents) : std::nullopt;
+	if (!floor && m_Arrangement.Value())
+		floor = FloorOf(m_Arrangement.Value()->m_Extents);
 	m_pPartner->SetFloor(floor);
 }
 

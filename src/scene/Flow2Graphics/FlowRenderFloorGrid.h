@@ -14,7 +14,8 @@ class VRenderFloorGrid;
 namespace Flow2Graphics
 {
 
-/// The floor: the measured one, else the one below subjects that stand side by side, else the one of the options.
+/// The floor of the volume; without one the floor below the subjects that stand side by side. Without either the floor
+/// is as large as the options say.
 class VFlowRenderFloorGrid : public IFlowRenderType
 {
 public:
@@ -25,9 +26,7 @@ public:
 private:
 	const std::shared_ptr<OrlexGraphics::VRenderFloorGrid> m_pPartner;
 	Flow2TypesUtils::VItemCacheTyped<Flow2TypesUtils::FlowFloorItem> m_Floor;
-	Flow2TypesUtils::VItemCacheTyped<Flow2TypesUtils::FlowSubjectSceneTransformItem> m_SceneTransform;
-	/// Of both, of the floor that is drawn.
-	std::uint64_t m_Generation = 0;
+	Flow2TypesUtils::VItemCacheTyped<Flow2TypesUtils::FlowSubjectSceneTransformItem> m_Arrangement;
 };
 
 } // namespace Flow2Graphics

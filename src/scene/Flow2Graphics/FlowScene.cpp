@@ -1,11 +1,17 @@
 #include "Flow2Graphics/FlowScene.h"
 
+#include "Flow2Graphics/FlowRenderCameras.h"
 #include "Flow2Graphics/FlowRenderFloorGrid.h"
+#include "Flow2Graphics/FlowRenderForcePlates.h"
+#include "Flow2Graphics/FlowRenderGeometry.h"
+#include "Flow2Graphics/FlowRenderReconstructionVolume.h"
+#include "Flow2Graphics/FlowRenderReconstructions.h"
 #include "Flow2Graphics/FlowRenderSubjects.h"
 #include "OrlexGraphics/RenderAxis.h"
 #include "OrlexGraphics/RenderFloorGrid.h"
 #include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/RenderOutlines.h"
+#include "OrlexGraphics/RenderReconstructionVolume.h"
 #include "OrlexGraphics/RenderVolumeManipulator.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SkinCache.h"
@@ -62,7 +68,15 @@ void VFlowScene::InitialiseGL()
 		return;
 	// In the order of drawing.
 	AddFlowType<VFlowRenderFloorGrid>(std::make_shared<OrlexGraphics::VRenderFloorGrid>(*m_pShaderLibrary));
+	AddFlowType<VFlowRenderForcePlates>(
+	    std::make_shared<OrlexGraphics::VRenderForcePlates>(*m_pShaderLibrary, m_pRegistry));
+	AddFlowType<VFlowRenderReconstructions>(std::make_shared<OrlexGraphics::VRenderReconstructions>(*m_pShaderLibrary));
 	AddSubjects();
+	m_pCameraType = std::make_shared<OrlexGraphics::VRenderCameras>();
+	AddFlowType<VFlowRenderCameras>(m_pCameraType);
+	const auto pGeometry = std::make_shared<VFlowRenderGeometry>(*m_pShaderLibrary);
+	m_RenderList.push_back(pGeometry);
+	m_FlowTypes.push_back(pGeometry);
 	m_pRenderManipulator =
 	    std::make_shared<OrlexGraphics::VRenderManipulator>(*m_pShaderLibrary, m_pRegistry, SelectionManager());
 	m_pManipulator = m_pRenderManipulator;
@@ -80,6 +94,9 @@ void VFlowScene::InitialiseGL()
 	    {QVector3D(-5000.0f, -5000.0f, -100.0f), QVector3D(5000.0f, 5000.0f, 3000.0f)});
 	m_pReconstructionVolumeManipulator = m_pRenderReconstructionVolumeManipulator;
 	m_pHotspotVolumeManipulator = m_pRenderHotspotVolumeManipulator;
+	AddFlowType<VFlowRenderReconstructionVolume>(
+	    std::make_shared<OrlexGraphics::VRenderReconstructionVolume>(*m_pShaderLibrary),
+	    m_pRenderReconstructionVolumeManipulator, m_pRenderHotspotVolumeManipulator);
 	m_RenderList.push_back(std::make_shared<OrlexGraphics::VRenderAxis>(*m_pShaderLibrary));
 	m_PostList.push_back(std::make_shared<OrlexGraphics::VRenderOutlines>(*m_pShaderLibrary, m_pRegistry));
 }

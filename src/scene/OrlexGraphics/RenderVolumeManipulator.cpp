@@ -83,7 +83,7 @@ VRenderVolumeManipulator::VRenderVolumeManipulator(CoreGraphics::VShaderLibrary&
     std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager, std::string i_Name,
     const QVector3D& i_rColour, const VVolume& i_rVolume)
     : m_pRegistry(std::move(i_pRegistry)), m_pSelectionManager(std::move(i_pSelectionManager)),
-      m_Name(std::move(i_Name)), m_Colour(i_rColour), m_State{false, i_rVolume},
+      m_Name(std::move(i_Name)), m_Colour(i_rColour), m_State{false, false, i_rVolume},
       m_pDrawing(std::make_unique<VDrawing>(io_rLibrary))
 {
 }
@@ -157,7 +157,27 @@ void VRenderVolumeManipulator::Release()
 
 void VRenderVolumeManipulator::Synchronise()
 {
+	if (m_Brought && !IsDragging())
+	{
+		m_State.Take(*m_Brought);
+		m_Brought.reset();
+	}
+	m_State.m_bDragged = IsDragging();
 	m_Drawn = m_State;
+}
+
+void VRenderVolumeManipulator::VState::Take(const std::optional<VVolume>& i_rVolume)
+{
+	m_bVisible = i_rVolume.has_value();
+	if (i_rVolume)
+		m_Volume = *i_rVolume;
+}
+
+void VRenderVolumeManipulator::BringVolume(const std::optional<VVolume>& i_rVolume)
+{
+	m_Brought.emplace(i_rVolume && IsValid(*i_rVolume) ? i_rVolume : std::nullopt);
+	if (!m_Drawn.m_bDragged)
+		m_Drawn.Take(*m_Brought);
 }
 
 void VRenderVolumeManipulator::AllocateIds()
@@ -203,10 +223,7 @@ void VRenderVolumeManipulator::RenderBox(VRenderContext& io_rContext)
 	CoreGraphics::VRenderState state;
 	state.m_bDepthTest = true;
 	io_rContext.ApplyState(state);
-	QMatrix4x4 model;
-	model.translate(0.5f * (m_Drawn.m_Volume.m_Minimum + m_Drawn.m_Volume.m_Maximum));
-	model.scale(m_Drawn.m_Volume.m_Maximum - m_Drawn.m_Volume.m_Minimum);
-	io_rContext.SetUniform(m_pDrawing->m_Model, model);
+	io_rContext.SetUniform(m_pDrawing->m_Model, BoxTransform(m_Drawn.m_Volume));
 	io_rContext.SetUniform(m_pDrawing->m_LineColour, QVector4D(m_Colour, 1.0f));
 	io_rContext.BindVertices(m_pDrawing->m_WireBox.m_Vertices);
 	io_rContext.DrawElements(GL_LINES, m_pDrawing->m_WireBox.m_Indices);

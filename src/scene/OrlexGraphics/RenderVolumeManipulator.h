@@ -30,8 +30,8 @@ namespace OrlexGraphics
 
 class VSelectionRegistry;
 
-/// A box in the scene, whose sides and place the mouse can drag. It is hidden until it is shown. The signal fires on
-/// the user interface thread, in the mouse's event.
+/// A box in the scene, whose sides and place the mouse can drag. It is hidden until it is shown, or a frame brings it.
+/// The signal fires on the user interface thread, in the mouse's event.
 class VRenderVolumeManipulator : public IRenderType, public IManipulator
 {
 public:
@@ -46,6 +46,7 @@ public:
 
 	const std::string& Name() const { return m_Name; }
 	const QVector3D& Colour() const { return m_Colour; }
+	bool IsVisible() const { return m_State.m_bVisible; }
 	void SetVisible(bool i_bVisible);
 	/// Nothing while it is dragged.
 	void SetVolume(const VVolume& i_rVolume);
@@ -65,6 +66,10 @@ public:
 
 	// For the render thread.
 
+	/// What a frame brings: shown from this frame on, or hidden if there is none or it has no inside. During a drag it
+	/// waits for its end.
+	void BringVolume(const std::optional<VVolume>& i_rVolume);
+
 	/// The ids of the handles in the frame that is being made: in each frame update, after the registry's Reset.
 	void AllocateIds();
 
@@ -81,7 +86,10 @@ private:
 	struct VState
 	{
 		bool m_bVisible = false;
+		bool m_bDragged = false;
 		VVolume m_Volume;
+
+		void Take(const std::optional<VVolume>& i_rVolume);
 	};
 
 	static constexpr std::size_t c_Handles = 11;
@@ -103,6 +111,8 @@ private:
 
 	// Of the render thread.
 	VState m_Drawn;
+	/// By a frame since the last exchange, or during a drag.
+	std::optional<std::optional<VVolume>> m_Brought;
 	std::array<CoreGraphics::VSelectionId, c_Handles> m_Ids{};
 	const std::unique_ptr<VDrawing> m_pDrawing;
 };

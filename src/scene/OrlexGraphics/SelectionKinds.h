@@ -15,7 +15,8 @@ enum ESceneSelectionKind : std::uint32_t
 	ESelectionKeptInCameraView = 27,
 	/// Group and axis of a handle of the manipulator.
 	ESelectionManipulatorHandle = 28,
-	ESelectionVolumeManipulatorHandle = 34
+	ESelectionVolumeManipulatorHandle = 34,
+	ESelectionForcePlate = 36
 };
 
 /// Whether items of a kind take one id for each of their children, whose number the picked item carries.

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "OrlexGraphics/ManipulatorDrag.h"
+#include "OrlexGraphics/Volume.h"
 
 #include <QVector3D>
 
@@ -9,15 +10,6 @@
 
 namespace OrlexGraphics
 {
-
-/// A box along the axes, in millimetres.
-struct VVolume
-{
-	QVector3D m_Minimum;
-	QVector3D m_Maximum;
-
-	bool operator==(const VVolume&) const = default;
-};
 
 /// What the handles of a volume move.
 enum EVolumeHandle : std::uint32_t
