@@ -99,7 +99,6 @@ void VPreferencesDialog::AddFolderRow(QGridLayout& io_rLayout, const std::string
 	const int row = io_rLayout.rowCount();
 	auto* const pEdit = Named(new QLineEdit, i_rKey.c_str(), i_rLabel);
 	pEdit->setPlaceholderText(tr("not set"));
-	pEdit->setClearButtonEnabled(true);
 	auto* const pWarning = Named(new QLabel, (i_rKey + "Warning").c_str(), tr("Note on %1").arg(i_rLabel));
 	connect(pEdit, &QLineEdit::textChanged, pWarning,
 	    [pWarning](const QString& i_rText)

@@ -54,6 +54,8 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	setWindowTitle(tr("Retarget Studio"));
 	setAcceptDrops(true);
 	setDockNestingEnabled(true);
+	// Docks stand where they belong at once.
+	setAnimated(false);
 
 	m_pNotice = Named(new QLabel, "Notice", tr("Why there is no panel"));
 	m_pNotice->setAlignment(Qt::AlignCenter);
