@@ -158,11 +158,16 @@ TEST_F(Window, TheWholeJob)
 	rOperator.Fill("TargetWeight", "2.5");
 	rOperator.Fill("TargetStateExpressionX", "12.5");
 	rOperator.Fill("TargetStateExpressionY", "-3");
-	rOperator.Replace("TargetStateExpressionZ", "-0.5");
 	edits += {"--weight", "6=2.5", "--state", "6=12.5,-3,-0.5"};
+	rOperator.Replace("TargetStateExpressionZ", "-0.5");
 	// What stands in a field belongs to the target that it was typed for.
+	rOperator.ClickRow("targets", 2);
+	EXPECT_EVENTUALLY(rOperator.Property("TargetWeight", "text").toString() == "1");
+	rOperator.Fill("TargetWeight", "500");
+	EXPECT_EVENTUALLY(rOperator.Property("TargetWeightReason", "visible").toBool());
 	rOperator.ClickRow("targets", 1);
-	EXPECT_EVENTUALLY(!rOperator.Property("TargetWeight", "text").toString().startsWith("2.5"));
+	EXPECT_EVENTUALLY(rOperator.Property("TargetWeight", "text").toString() == "1");
+	EXPECT_FALSE(rOperator.Property("TargetWeightReason", "visible").toBool());
 	rOperator.Click("removeTarget");
 	EXPECT_EVENTUALLY(Targets() == 6);
 	rOperator.Click("createAllJoints");

@@ -60,7 +60,15 @@ void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers)
 {
 	const QQuickItem* const pItem = Item(i_rName);
 	ASSERT_TRUE(pItem && pItem->isEnabled() && pItem->isVisible()) << i_rName.toStdString();
-	const QPoint place = pItem->mapToScene({pItem->width() / 2, pItem->height() / 2}).toPoint();
+	// Not while the layout still moves it.
+	QPoint place(-1, -1);
+	ASSERT_TRUE(Eventually(
+	    [&]
+	    {
+		    const QPoint now = pItem->mapToScene({pItem->width() / 2, pItem->height() / 2}).toPoint();
+		    QTest::qWait(0);
+		    return std::exchange(place, now) == now;
+	    }));
 	ASSERT_TRUE(m_rPanel.rect().contains(place)) << i_rName.toStdString();
 	const QPoint inWindow = m_rPanel.mapTo(&m_rWindow, place);
 	QTest::mouseMove(m_rWindow.windowHandle(), inWindow);

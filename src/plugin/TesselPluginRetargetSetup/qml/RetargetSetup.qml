@@ -254,7 +254,8 @@ Rectangle {
 						: sourceSegments.count === 0 ? "Choose a source skeleton above."
 						: "Select one segment in each list on the right, then add a target."
 					Layout.fillHeight: true
-					Layout.minimumHeight: 6 * Theme.itemHeight
+					// Room for reasons of refusal beside the parameters.
+					Layout.minimumHeight: 3 * Theme.itemHeight
 				}
 
 				OrlexButton {
@@ -267,10 +268,16 @@ Rectangle {
 				}
 
 				ParameterView {
+					id: targetParameters
+
+					// What was typed for one target must not stand at another.
+					readonly property int shownTarget: RetargetSetupSelection.selectedTarget
+
 					objectName: "targetParameters"
 					Layout.fillWidth: true
-					enabled: RetargetSetupSelection.selectedTarget !== -1
+					enabled: shownTarget !== -1
 					model: retargetSetup.targetParametersModel
+					onShownTargetChanged: restore()
 				}
 			}
 		}

@@ -26,6 +26,13 @@ Item {
 	onValueTextChanged: restore()
 	Component.onCompleted: restore()
 
+	Connections {
+		target: editor.row ? editor.row : null
+		function onRestored() {
+			editor.restore()
+		}
+	}
+
 	OrlexTextArea {
 		id: field
 		width: parent.width

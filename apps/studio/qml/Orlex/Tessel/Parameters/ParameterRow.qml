@@ -12,7 +12,10 @@ Item {
 	property var groupModel
 	property int labelWidth: 100
 
+	property int generation: 0
+
 	property string error: ""
+	property string refusedText: ""
 	readonly property string name: parameter.name
 	readonly property string label: parameter.display || parameter.name
 	readonly property string toolTip: parameter.description || ""
@@ -44,6 +47,7 @@ Item {
 	// keeps what it had.
 	function commit(text) {
 		error = groupModel.setValueText(parameterIndex, text)
+		refusedText = error !== "" ? text : ""
 		return error === ""
 	}
 	function editorUrl() {
@@ -59,6 +63,16 @@ Item {
 		if (hint === colour)
 			return "ColourEditor.qml"
 		return "TextEditor.qml"
+	}
+
+	// The editors show what the parameter holds.
+	signal restored()
+
+	onGenerationChanged: {
+		if (error !== "")
+			console.warn(label + ": \"" + refusedText + "\" was not taken. " + error)
+		error = ""
+		restored()
 	}
 
 	objectName: name + "Row"

@@ -8,6 +8,7 @@ Column {
 	property var model: null
 	property bool advanced: false
 	property int labelWidth: 100
+	property int generation: 0
 	property int shownCount: 0
 
 	function categoryBefore(index) {
@@ -67,6 +68,7 @@ Column {
 					parameterIndex: entry.parameterIndex
 					groupModel: section.model
 					labelWidth: section.labelWidth
+					generation: section.generation
 				}
 			}
 		}

@@ -10,6 +10,13 @@ FocusScope {
 	property var model: null
 	property int labelWidth: 100
 	property alias advancedShown: fold.checked
+	property int generation: 0
+
+	// All rows show what the parameters hold: to be called when these are of something else from now on. What was
+	// refused is told in the log, since it is seen no longer.
+	function restore() {
+		generation += 1
+	}
 
 	implicitWidth: 260
 	implicitHeight: column.implicitHeight
@@ -25,6 +32,7 @@ FocusScope {
 			width: parent.width
 			model: view.model
 			labelWidth: view.labelWidth
+			generation: view.generation
 		}
 		OrlexDisclosure {
 			id: fold
@@ -37,6 +45,7 @@ FocusScope {
 			width: parent.width
 			model: view.model
 			labelWidth: view.labelWidth
+			generation: view.generation
 			advanced: true
 			visible: fold.checked && shownCount > 0
 		}

@@ -34,6 +34,13 @@ Item {
 	onValueTextChanged: restore()
 	Component.onCompleted: restore()
 
+	Connections {
+		target: editor.row ? editor.row : null
+		function onRestored() {
+			editor.restore()
+		}
+	}
+
 	OrlexTextField {
 		id: field
 		objectName: editor.row ? editor.row.name : ""
