@@ -1,107 +1,25 @@
-#include "../CoreGraphics/OffscreenContext.h"
+#include "PicturesFixture.h"
+
 #include "../OrlexGraphics/Allocations.h"
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexTypesUtils/PoseVector.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
-#include "Flow2Graphics/FlowScene.h"
 #include "Flow2Graphics/SubjectTypes.h"
-#include "InMemoryHost/Dispatcher.h"
-#include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/FrameRenderer.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "TestSubject.h"
 
-#include "CoreGraphics/ShaderLibrary.h"
-
-#include <QImage>
-#include <QOpenGLFramebufferObject>
-
-#include <cstdlib>
 #include <functional>
 
-/// Frames of the flow scene beside stored pictures, which were looked at. RETARGET_REMAKE_PICTURES=1 stores them anew.
 namespace
 {
 
 using namespace Flow2Graphics;
-using OrlexGraphics::VSceneOptions;
 using OrlexGraphics::VSubjectOptions;
 using TestSubject::Item;
 
-/// What the drivers of a machine may make of the same frame: edges that fall on other sides of a pixel.
-constexpr int c_LargestDifference = 96;
-/// Of a channel, over the whole picture.
-constexpr double c_MeanDifference = 0.35;
-
-struct VView
-{
-	QVector3D m_Centre;
-	float m_Distance = 1000.0f;
-	float m_Pitch = -70.0f;
-	float m_Yaw = 30.0f;
-};
-
-class Pictures : public testing::Test
+class Pictures : public VPicturesTest
 {
 protected:
-	void SetUp() override
-	{
-		ASSERT_TRUE(m_Context.IsValid());
-		m_pScene = std::make_shared<VFlowScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false);
-		m_Renderer.Initialise();
-		m_Renderer.SetScene(m_pScene);
-		m_Renderer.SetSize(m_Size);
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(m_Size, m_Renderer.TargetFormat());
-		Options().m_bFloorGrid = Options().m_bGlobalAxis = false;
-	}
-	void TearDown() override { EXPECT_EQ(m_Context.GL().glGetError(), static_cast<GLenum>(GL_NO_ERROR)); }
-
-	VSceneOptions& Options() { return m_Renderer.m_Input.m_Options; }
-
-	QImage Draw(const VView& i_rView)
-	{
-		CoreGraphics::VCameraController& rCamera = m_Renderer.m_Input.m_Camera;
-		rCamera.m_Centre = i_rView.m_Centre;
-		rCamera.m_Distance = i_rView.m_Distance;
-		rCamera.m_Pitch = i_rView.m_Pitch;
-		rCamera.m_Yaw = i_rView.m_Yaw;
-		rCamera.SetSize(m_Size);
-		m_pScene->SetNeedsRefresh();
-		m_pScene->Synchronise();
-		m_Renderer.Update();
-		m_Renderer.Render(*m_pTarget);
-		return m_pTarget->toImage().convertToFormat(QImage::Format_RGB32);
-	}
-
-	/// Beside the stored one.
-	void Compare(const QImage& i_rImage, const std::string& i_rName)
-	{
-		const QString path = QString::fromStdString(RETARGET_TEST_DATA "/pictures/" + i_rName + ".png");
-		if (std::getenv("RETARGET_REMAKE_PICTURES"))
-		{
-			ASSERT_TRUE(i_rImage.save(path)) << path.toStdString();
-			return;
-		}
-		const QImage stored = QImage(path).convertToFormat(QImage::Format_RGB32);
-		ASSERT_EQ(stored.size(), i_rImage.size()) << path.toStdString();
-		int largest = 0;
-		double sum = 0.0;
-		for (int y = 0; y < stored.height(); ++y)
-			for (int x = 0; x < stored.width(); ++x)
-				for (const int shift : {0, 8, 16})
-				{
-					const int difference =
-					    std::abs(int(stored.pixel(x, y) >> shift & 0xff) - int(i_rImage.pixel(x, y) >> shift & 0xff));
-					largest = std::max(largest, difference);
-					sum += difference;
-				}
-		const double mean = sum / (3.0 * stored.width() * stored.height());
-		EXPECT_LE(largest, c_LargestDifference) << i_rName;
-		EXPECT_LE(mean, c_MeanDifference) << i_rName;
-		if (HasFailure())
-			i_rImage.save(QString::fromStdString(i_rName + ".png"));
-	}
-
 	/// The small subject as one for solving.
 	void ShowSmall(const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr)
 	{
@@ -143,16 +61,6 @@ protected:
 		add(RETARGET_TEST_DATA "/pictures/kestrel.qrr", VFlowSubjectForSolvingTypes::c_Types, &VJoint::m_BindPose);
 		m_pScene->SetFrame(TestSubject::Frame(items));
 	}
-
-	const QSize m_Size{320, 240};
-	GraphicsTest::VOffscreenContext m_Context{GraphicsTest::EDialect::Desktop};
-	const std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
-	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
-	    std::make_shared<InMemoryHost::VSelectionManager>();
-	const std::shared_ptr<CoreGraphics::VShaderLibrary> m_pShaders = std::make_shared<CoreGraphics::VShaderLibrary>();
-	std::shared_ptr<VFlowScene> m_pScene;
-	OrlexGraphics::VFrameRenderer m_Renderer;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 };
 
 VSubjectOptions Only(const std::function<void(VSubjectOptions&)>& i_rSwitchOn)

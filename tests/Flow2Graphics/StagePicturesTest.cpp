@@ -1,0 +1,150 @@
+#include "PicturesFixture.h"
+
+#include "Flow2Graphics/FlowRenderForcePlates.h"
+#include "Flow2Graphics/FlowRenderGeometry.h"
+#include "Flow2Graphics/FlowRenderReconstructionVolume.h"
+#include "Flow2Graphics/FlowRenderReconstructions.h"
+#include "Flow2TypesUtils/ParameterSet.h"
+#include "InMemoryHost/Flow.h"
+#include "TestSubject.h"
+
+namespace
+{
+
+using namespace Flow2Graphics;
+using TestSubject::Frame;
+
+/// What stands on a stage without subjects.
+class StagePictures : public VPicturesTest
+{
+protected:
+	void SetUp() override
+	{
+		VPicturesTest::SetUp();
+		Options().m_bFloorGrid = Options().m_bGlobalAxis = true;
+	}
+
+	template <typename T>
+	void Show(const char* i_pFlowType, const T& i_rValue)
+	{
+		const NVX::CountedPointer<TesselPluginInterface::IFlowItem> pItem(new InMemoryHost::VFlowItem<T>(i_pFlowType));
+		TesselPluginInterface::SetItemValue(pItem, std::make_shared<const T>(i_rValue));
+		m_Items.push_back(pItem);
+		m_pScene->SetFrame(Frame(m_Items));
+	}
+
+	std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>> m_Items;
+};
+
+const VView c_Above{{0, 0, 0}, 7000.0f, -65.0f, 30.0f};
+const VView c_Below{{0, 0, 0}, 7000.0f, -115.0f, 30.0f};
+
+} // namespace
+
+TEST_F(StagePictures, OfTheFloor)
+{
+	const struct
+	{
+		const char* m_pName;
+		bool m_bYUp;
+		bool m_bTranslucent;
+		std::uint32_t m_Type;
+		VView m_View;
+	} c_Rows[] = {
+	    {"floor-above", false, true, CoreGraphics::ECameraPerspective, c_Above},
+	    {"floor-below", false, true, CoreGraphics::ECameraPerspective, c_Below},
+	    {"floor-above-y-up", true, true, CoreGraphics::ECameraPerspective, c_Above},
+	    {"floor-below-y-up", true, true, CoreGraphics::ECameraPerspective, c_Below},
+	    {"floor-above-opaque", false, false, CoreGraphics::ECameraPerspective, c_Above},
+	    {"floor-below-opaque", false, false, CoreGraphics::ECameraPerspective, c_Below},
+	    {"floor-front", false, true, CoreGraphics::ECameraFront, {}},
+	    {"floor-back", false, true, CoreGraphics::ECameraBack, {}},
+	    {"floor-left", false, true, CoreGraphics::ECameraLeft, {}},
+	    {"floor-right", false, true, CoreGraphics::ECameraRight, {}},
+	    {"floor-top", false, true, CoreGraphics::ECameraTop, {}},
+	    {"floor-bottom", false, true, CoreGraphics::ECameraBottom, {}},
+	    {"floor-top-y-up", true, true, CoreGraphics::ECameraTop, {}},
+	};
+	for (const auto& rRow : c_Rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		m_pScene->SetYUp(rRow.m_bYUp);
+		Options().m_bFloorGridIsTranslucent = rRow.m_bTranslucent;
+		Options().m_FloorGridSize = rRow.m_Type == CoreGraphics::ECameraPerspective ? 6.0f : 2.0f;
+		m_Renderer.m_Input.m_Camera.m_Type = rRow.m_Type;
+		m_Renderer.m_Input.m_Camera.m_OrthographicScale = 10.0f;
+		Compare(Draw(rRow.m_View), rRow.m_pName);
+	}
+}
+
+TEST_F(StagePictures, OfVolumes)
+{
+	auto pSet = std::make_shared<Flow2Utils::VParameterSet>();
+	const std::pair<const char*, float> c_Limits[] = {{"MinReconX", -2000.0f}, {"MinReconY", -2000.0f},
+	    {"MinReconZ", 0.0f}, {"MaxReconX", 2000.0f}, {"MaxReconY", 2000.0f}, {"MaxReconZ", 2500.0f},
+	    {"MinHotspotX", -800.0f}, {"MinHotspotY", -1000.0f}, {"MinHotspotZ", 0.0f}, {"MaxHotspotX", 800.0f},
+	    {"MaxHotspotY", 1000.0f}, {"MaxHotspotZ", 1800.0f}};
+	for (const auto& [pName, value] : c_Limits)
+	{
+		auto pParameter = std::make_unique<Flow2Utils::VParameterTyped<float>>(pName);
+		pParameter->Set(value);
+		pSet->Add(std::move(pParameter));
+	}
+	using Flow2TypesUtils::FlowParametersItem;
+	Show(FlowParametersItem::c_pName, FlowParametersItem{pSet, VFlowRenderReconstructionVolume::c_pGroup, {}});
+	const VView view{{0, 0, 1000}, 8500.0f, -70.0f, 30.0f};
+	Compare(Draw(view), "volumes");
+	Options().m_bManipulator = false;
+	Compare(Draw(view), "reconstruction-volume");
+	Options().m_bReconstructionVolume = Options().m_bFloorGrid = Options().m_bGlobalAxis = false;
+	const QImage nothing = Draw(view);
+	EXPECT_EQ(nothing.pixel(160, 120), 0xff202020u);
+	m_Items.clear();
+}
+
+TEST_F(StagePictures, OfPlatesPointsAndGeometry)
+{
+	OrlexGraphics::VForcePlate left, right;
+	left.m_Transform.translate(-250, 0, 0);
+	right.m_Transform.translate(250, 0, 0);
+	right.m_Force = QVector3D(50, 20, 700);
+	right.m_CentreOfPressure = QVector3D(40, -80, 0);
+	Show("FlowDeviceSamples", VFlowRenderForcePlates::VValue{left, right});
+	Show("FlowReconstructionSet",
+	    VFlowRenderReconstructions::VValue{{-300, 0, 600}, {-100, 100, 900}, {-400, 50, 1100}});
+	VGeometry geometry;
+	geometry.m_Lines.push_back({{{-600, 600, 0}, {600, 600, 1000}}, {0.2f, 0.8f, 1.0f, 1.0f}});
+	geometry.m_Points.push_back({{{-600, 600, 0}, {600, 600, 1000}}, {1.0f, 0.8f, 0.2f, 1.0f}, 7.0f});
+	geometry.m_Lines2D.push_back({{{-0.2f, 0.0f}, {0.2f, 0.0f}}, {0.4f, 1.0f, 0.4f, 1.0f}, 0.785398f, {}});
+	Show(VGeometry::c_pName, geometry);
+	Options().m_ReconstructionScale = 6.0f;
+	Compare(Draw({{0, 0, 450}, 2200.0f, -70.0f, 30.0f}), "plates-points-geometry");
+}
+
+TEST_F(StagePictures, OfTextWhereItStands)
+{
+	VGeometry geometry;
+	geometry.m_Texts = {{QStringLiteral("HHHH"), QVector3D(0, 0, 0), {1, 0, 0, 1}, false},
+	    {QStringLiteral("HHHH"), QVector3D(-0.9f, 0.8f, 0), {0, 1, 0, 1}, true}};
+	Show(VGeometry::c_pName, geometry);
+	Options().m_bFloorGrid = Options().m_bGlobalAxis = false;
+	Draw({{0, 0, 0}, 2000.0f, -70.0f, 30.0f});
+	m_pTarget->bind();
+	m_Renderer.Paint();
+	const QImage image = m_pTarget->toImage();
+	const auto extent = [&](int (*i_pChannel)(QRgb))
+	{
+		QRect extent;
+		for (int y = 0; y < image.height(); ++y)
+			for (int x = 0; x < image.width(); ++x)
+				if (i_pChannel(image.pixel(x, y)) > 0x80)
+					extent |= QRect(x, y, 1, 1);
+		return extent;
+	};
+	// From the point to the right, above it.
+	EXPECT_NEAR(extent(qRed).left(), 160, 3);
+	EXPECT_NEAR(extent(qRed).bottom(), 119, 2);
+	EXPECT_NEAR(extent(qGreen).left(), 16, 3);
+	EXPECT_NEAR(extent(qGreen).bottom(), 23, 2);
+	EXPECT_GT(extent(qGreen).width(), 15);
+}
