@@ -96,11 +96,11 @@ void VRenderFloorGrid::Render(VRenderContext& io_rContext, const VSceneOptions& 
 		return;
 	const VFloor floor = GetFloor(i_rOptions);
 	io_rContext.ApplyState(StateOf(bTranslucent));
-	RenderLines(io_rContext, floor, bTranslucent);
+	RenderLines(io_rContext, floor);
 	RenderEdges(io_rContext, floor);
 }
 
-void VRenderFloorGrid::RenderLines(VRenderContext& io_rContext, const VFloor& i_rFloor, bool i_bTranslucent)
+void VRenderFloorGrid::RenderLines(VRenderContext& io_rContext, const VFloor& i_rFloor)
 {
 	if (!m_pTexture || !m_pTexture->IsUsable())
 		m_pTexture = MakeTexture();
@@ -114,12 +114,9 @@ void VRenderFloorGrid::RenderLines(VRenderContext& io_rContext, const VFloor& i_
 	io_rContext.SetUniform(m_Texture, 0);
 	io_rContext.SetUniform(m_GridSpacings,
 	    QVector2D(i_rFloor.m_Spacing, i_rFloor.m_Spacing / static_cast<float>(std::max(i_rFloor.m_Divisions, 1u))));
-	// What lies on an opaque floor is not to fight with it.
-	if (!i_bTranslucent)
-	{
-		io_rContext.m_pFunctions->glEnable(GL_POLYGON_OFFSET_FILL);
-		io_rContext.m_pFunctions->glPolygonOffset(1.0f, 1.0f);
-	}
+	// What lies in the floor is not to fight with it.
+	io_rContext.m_pFunctions->glEnable(GL_POLYGON_OFFSET_FILL);
+	io_rContext.m_pFunctions->glPolygonOffset(1.0f, 1.0f);
 	io_rContext.BindVertices(m_Square);
 	DrawExtents(io_rContext, GL_TRIANGLE_FAN, ExtentsOf(i_rFloor));
 	io_rContext.m_pFunctions->glDisable(GL_POLYGON_OFFSET_FILL);

@@ -53,7 +53,7 @@ public:
 	    CoreGraphics::VRenderContext& io_rContext, const VSceneOptions& i_rOptions, std::uint32_t i_Pass) override;
 
 private:
-	void RenderLines(CoreGraphics::VRenderContext& io_rContext, const VFloor& i_rFloor, bool i_bTranslucent);
+	void RenderLines(CoreGraphics::VRenderContext& io_rContext, const VFloor& i_rFloor);
 	void RenderEdges(CoreGraphics::VRenderContext& io_rContext, const VFloor& i_rFloor);
 	void DrawExtents(CoreGraphics::VRenderContext& io_rContext, unsigned int i_Mode, const QVector4D& i_rExtents);
 
