@@ -1,11 +1,21 @@
 #include "PicturesFixture.h"
 
+#include "../OrlexGraphics/Allocations.h"
 #include "Flow2Graphics/FlowRenderForcePlates.h"
 #include "Flow2Graphics/FlowRenderGeometry.h"
 #include "Flow2Graphics/FlowRenderReconstructionVolume.h"
 #include "Flow2Graphics/FlowRenderReconstructions.h"
+#include "Flow2Graphics/RenderSubjectDynamics.h"
+#include "Flow2Graphics/RenderSubjectMarkers.h"
 #include "Flow2TypesUtils/ParameterSet.h"
 #include "InMemoryHost/Flow.h"
+#include "OrlexGraphics/RenderAxis.h"
+#include "OrlexGraphics/RenderCameras.h"
+#include "OrlexGraphics/RenderFloorGrid.h"
+#include "OrlexGraphics/RenderManipulator.h"
+#include "OrlexGraphics/RenderOutlines.h"
+#include "OrlexGraphics/RenderReconstructionVolume.h"
+#include "OrlexGraphics/RenderVolumeManipulator.h"
 #include "TestSubject.h"
 
 namespace
@@ -33,8 +43,24 @@ protected:
 		m_pScene->SetFrame(Frame(m_Items));
 	}
 
+	/// The frame that was drawn last, once more. The first ones make the driver compile its shaders.
+	void ExpectNoAllocation()
+	{
+		for (int i = 0; i < 3; ++i)
+			m_Renderer.Render(*m_pTarget);
+		const std::size_t before = AllocationCount();
+		m_Renderer.Render(*m_pTarget);
+		EXPECT_EQ(AllocationCount() - before, 0u);
+	}
+
 	std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>> m_Items;
 };
+
+template <typename T>
+bool Is(const OrlexGraphics::IRenderType& i_rType)
+{
+	return dynamic_cast<const T*>(&i_rType) != nullptr;
+}
 
 const VView c_Above{{0, 0, 0}, 7000.0f, -65.0f, 30.0f};
 const VView c_Below{{0, 0, 0}, 7000.0f, -115.0f, 30.0f};
@@ -94,12 +120,12 @@ TEST_F(StagePictures, OfVolumes)
 	Show(FlowParametersItem::c_pName, FlowParametersItem{pSet, VFlowRenderReconstructionVolume::c_pGroup, {}});
 	const VView view{{0, 0, 1000}, 8500.0f, -70.0f, 30.0f};
 	Compare(Draw(view), "volumes");
+	ExpectNoAllocation();
 	Options().m_bManipulator = false;
 	Compare(Draw(view), "reconstruction-volume");
 	Options().m_bReconstructionVolume = Options().m_bFloorGrid = Options().m_bGlobalAxis = false;
 	const QImage nothing = Draw(view);
 	EXPECT_EQ(nothing.pixel(160, 120), 0xff202020u);
-	m_Items.clear();
 }
 
 TEST_F(StagePictures, OfPlatesPointsAndGeometry)
@@ -119,6 +145,7 @@ TEST_F(StagePictures, OfPlatesPointsAndGeometry)
 	Show(VGeometry::c_pName, geometry);
 	Options().m_ReconstructionScale = 6.0f;
 	Compare(Draw({{0, 0, 450}, 2200.0f, -70.0f, 30.0f}), "plates-points-geometry");
+	ExpectNoAllocation();
 }
 
 TEST_F(StagePictures, OfTextWhereItStands)
@@ -147,4 +174,49 @@ TEST_F(StagePictures, OfTextWhereItStands)
 	EXPECT_NEAR(extent(qGreen).left(), 16, 3);
 	EXPECT_NEAR(extent(qGreen).bottom(), 23, 2);
 	EXPECT_GT(extent(qGreen).width(), 15);
+}
+
+TEST_F(StagePictures, AreDrawnInTheirOrder)
+{
+	using namespace OrlexGraphics;
+	bool (*const c_Order[])(const IRenderType&) = {Is<VRenderFloorGrid>, Is<VRenderForcePlates>,
+	    Is<VRenderReconstructions>, Is<VRenderSubjectMarkers>, Is<VRenderSubjectMarkers>, Is<VRenderSubjectDynamics>,
+	    Is<VRenderCameras>, Is<VFlowRenderGeometry>, Is<VRenderManipulator>, Is<VRenderVolumeManipulator>,
+	    Is<VRenderVolumeManipulator>, Is<VRenderReconstructionVolume>, Is<VRenderAxis>};
+	auto next = m_pScene->RenderList().begin();
+	for (const auto& pIs : c_Order)
+	{
+		next = std::find_if(next, m_pScene->RenderList().end(),
+		    [&](const std::shared_ptr<IRenderType>& i_rpType) { return pIs(*i_rpType); });
+		ASSERT_NE(next, m_pScene->RenderList().end()) << &pIs - c_Order;
+		++next;
+	}
+	EXPECT_EQ(next, m_pScene->RenderList().end()) << "the axes are last";
+	EXPECT_EQ(m_pScene->PostList().size(), 1u);
+	EXPECT_TRUE(Is<VRenderOutlines>(*m_pScene->PostList().front()));
+
+	struct VRow
+	{
+		const char* m_pName;
+		std::shared_ptr<IManipulator> m_pManipulator;
+		QVector3D m_Colour;
+		VVolume m_Volume;
+	};
+	const VRow rows[] = {{"ReconstructionVolume", m_pScene->ReconstructionVolumeManipulator(), {0.7f, 0.7f, 0.7f},
+	                         {{-10000, -10000, -100}, {10000, 10000, 3000}}},
+	    {"HotspotVolume", m_pScene->HotspotVolumeManipulator(), {1.0f, 0.2f, 0.2f},
+	        {{-5000, -5000, -100}, {5000, 5000, 3000}}}};
+	for (const VRow& rRow : rows)
+	{
+		const auto* const pVolume = dynamic_cast<const VRenderVolumeManipulator*>(rRow.m_pManipulator.get());
+		ASSERT_TRUE(pVolume);
+		EXPECT_EQ(pVolume->Name(), rRow.m_pName);
+		EXPECT_EQ(pVolume->Colour(), rRow.m_Colour);
+		EXPECT_EQ(pVolume->Volume(), rRow.m_Volume);
+		EXPECT_FALSE(pVolume->IsVisible());
+	}
+	// A second view of the scene, and nothing twice.
+	const std::size_t count = m_pScene->RenderList().size();
+	m_pScene->InitialiseGL();
+	EXPECT_EQ(m_pScene->RenderList().size(), count);
 }
