@@ -45,7 +45,12 @@ class VRenderForcePlates : public IRenderType
 public:
 	VRenderForcePlates(CoreGraphics::VShaderLibrary& io_rLibrary, std::shared_ptr<VSelectionRegistry> i_pRegistry);
 
-	void SetPlates(std::shared_ptr<const std::vector<VForcePlate>> i_pPlates) { m_pPlates = std::move(i_pPlates); }
+	/// Drawn once they have ids. May be null.
+	void SetPlates(std::shared_ptr<const std::vector<VForcePlate>> i_pPlates)
+	{
+		m_pPlates = std::move(i_pPlates);
+		m_Ids.clear();
+	}
 	/// Ids and places of the plates in the frame that is being made: in each frame update, after the registry's Reset.
 	void AllocateIds();
 
