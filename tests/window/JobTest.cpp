@@ -214,10 +214,10 @@ TEST_F(Window, SelectsWithMouseAndKeys)
 	EXPECT_EVENTUALLY(selected() == 5);
 	const std::pair<Qt::Key, int> keys[] = {{Qt::Key_Down, 6}, {Qt::Key_Up, 5}, {Qt::Key_End, last},
 	    {Qt::Key_Down, last}, {Qt::Key_Home, 0}, {Qt::Key_Up, 0}};
-	for (const auto& [key, expected] : keys)
+	for (const auto& rKey : keys)
 	{
-		rOperator.Key(key);
-		EXPECT_EVENTUALLY(selected() == expected) << key;
+		rOperator.Key(rKey.first);
+		EXPECT_EVENTUALLY(selected() == rKey.second) << rKey.first;
 	}
 	auto& rPreSelection = m_pWindow->Context().GetSelectionManager()->PreSelection();
 	rOperator.Hover("sourceSegmentsRow2");
