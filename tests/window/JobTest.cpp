@@ -202,29 +202,49 @@ TEST_F(Window, SelectsWithMouseAndKeys)
 {
 	VOperator& rOperator = *m_pOperator;
 	rOperator.Choose("SourceSkeleton", "performer");
-	EXPECT_EVENTUALLY(rOperator.Property("sourceSegments", "count").toInt() > 20);
-	const int last = rOperator.Property("sourceSegments", "count").toInt() - 1;
-	const auto selected = [&] { return rOperator.Property("sourceSegments", "selectedIndex").toInt(); };
+	rOperator.Choose("TargetFBX", "character");
+	EXPECT_EVENTUALLY(rOperator.Property("TargetRoot", "currentText").toString() == "haunch");
+	rOperator.Click("createTargetSubject");
 
-	rOperator.ClickRow("sourceSegments", 3);
-	EXPECT_EVENTUALLY(selected() == 3);
-	rOperator.ClickRow("sourceSegments", 5, Qt::ControlModifier);
-	EXPECT_EVENTUALLY(selected() == -1) << "two are selected";
-	rOperator.ClickRow("sourceSegments", 3, Qt::ControlModifier);
-	EXPECT_EVENTUALLY(selected() == 5);
-	const std::pair<Qt::Key, int> keys[] = {{Qt::Key_Down, 6}, {Qt::Key_Up, 5}, {Qt::Key_End, last},
-	    {Qt::Key_Down, last}, {Qt::Key_Home, 0}, {Qt::Key_Up, 0}};
-	for (const auto& rKey : keys)
+	int other = -1;
+	for (const QString& rList : {QStringLiteral("sourceSegments"), QStringLiteral("targetSegments")})
 	{
-		rOperator.Key(rKey.first);
-		EXPECT_EVENTUALLY(selected() == rKey.second) << rKey.first;
+		SCOPED_TRACE(rList.toStdString());
+		EXPECT_EVENTUALLY(rOperator.Property(rList, "count").toInt() > 20);
+		const int last = rOperator.Property(rList, "count").toInt() - 1;
+		const auto selected = [&] { return rOperator.Property(rList, "selectedIndex").toInt(); };
+
+		rOperator.ClickRow(rList, 3);
+		EXPECT_EVENTUALLY(selected() == 3);
+		rOperator.ClickRow(rList, 5, Qt::ControlModifier);
+		EXPECT_EVENTUALLY(selected() == -1) << "two are selected";
+		rOperator.ClickRow(rList, 3, Qt::ControlModifier);
+		EXPECT_EVENTUALLY(selected() == 5);
+		const std::pair<Qt::Key, int> keys[] = {{Qt::Key_Down, 6}, {Qt::Key_Up, 5}, {Qt::Key_End, last},
+		    {Qt::Key_Down, last}, {Qt::Key_Home, 0}, {Qt::Key_Up, 0}};
+		for (const auto& rKey : keys)
+		{
+			rOperator.Key(rKey.first);
+			EXPECT_EVENTUALLY(selected() == rKey.second) << rKey.first;
+		}
+		auto& rPreSelection = m_pWindow->Context().GetSelectionManager()->PreSelection();
+		rOperator.Hover(rList + "Row2");
+		EXPECT_EVENTUALLY(rPreSelection.Items().size() == 1 && rPreSelection.Items()[0].m_ElementIndex == 2);
+		EXPECT_EQ(selected(), 0) << "pointing at a row selects nothing";
+		rOperator.Hover("updateTargets");
+		EXPECT_EVENTUALLY(rPreSelection.Items().empty());
+
+		if (other != -1)
+		{
+			EXPECT_EQ(rOperator.Property("sourceSegments", "selectedIndex").toInt(), other) << "lists are apart";
+		}
+		other = selected();
 	}
-	auto& rPreSelection = m_pWindow->Context().GetSelectionManager()->PreSelection();
-	rOperator.Hover("sourceSegmentsRow2");
-	EXPECT_EVENTUALLY(rPreSelection.Items().size() == 1 && rPreSelection.Items()[0].m_ElementIndex == 2);
-	EXPECT_EQ(selected(), 0) << "pointing at a row selects nothing";
-	rOperator.Hover("updateTargets");
-	EXPECT_EVENTUALLY(rPreSelection.Items().empty());
+	EXPECT_EVENTUALLY(rOperator.Property("addPositionTarget", "enabled").toBool());
+	rOperator.Click("jointSymmetry");
+	EXPECT_EVENTUALLY(!rOperator.Property("jointSymmetry", "checked").toBool());
+	rOperator.Click("jointSymmetry");
+	EXPECT_EVENTUALLY(rOperator.Property("jointSymmetry", "checked").toBool());
 }
 
 TEST_F(Window, ALegacyFileIsSavedUnderANewName)
