@@ -5,8 +5,12 @@
 #include "CoreOrlexTypesUtils/PoseVector.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
 #include "Flow2Graphics/SubjectTypes.h"
+#include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "TestSubject.h"
+
+#include <QQuaternion>
+#include <QtMath>
 
 #include <functional>
 
@@ -31,11 +35,12 @@ protected:
 		m_pScene->SetFrame(TestSubject::Frame(items));
 	}
 
-	/// Performer and character of the demo, in the poses that their files hold.
-	void ShowDemo()
+	/// Performer and character of the demo, in the poses that their files hold. The files have Z up.
+	void ShowDemo(bool i_bYUp = false)
 	{
+		m_pScene->SetYUp(i_bYUp);
 		std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>> items;
-		const auto add = [&items](const std::string& i_rPath, const VSubjectTypes& i_rTypes, auto i_pStatistic)
+		const auto add = [&](const std::string& i_rPath, const VSubjectTypes& i_rTypes, auto i_pStatistic)
 		{
 			CoreOrlexTypes::VSubjectParametrised parametrised;
 			CoreOrlexTypes::VSubjectApplicationData data;
@@ -51,17 +56,39 @@ protected:
 			items.push_back(Item(i_rTypes.m_Class == ESubjectClassSolving ? "FlowSubjectApplicationDataForSolving"
 			                                                              : "FlowSubjectApplicationData",
 			    std::move(data)));
+			std::vector<double> pose = CoreOrlexTypesUtils::PoseVector(parametrised, i_pStatistic);
+			if (i_bYUp)
+				TurnToYUp(pose);
 			items.push_back(Item(i_rTypes.m_Class == ESubjectClassSolving ? "FlowSubjectDynamicParametersForSolving"
 			                                                              : "FlowSubjectDynamicParameters",
-			    CoreOrlexTypes::VSubjectDynamicParameters{
-			        TestSubject::c_Id, CoreOrlexTypesUtils::PoseVector(parametrised, i_pStatistic)}));
+			    CoreOrlexTypes::VSubjectDynamicParameters{TestSubject::c_Id, std::move(pose)}));
 		};
 		using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
 		add(RETARGET_SOURCE "/demo/performer.qrs", VFlowSubjectTypes::c_Types, &VJoint::m_BindPose);
 		add(RETARGET_TEST_DATA "/pictures/kestrel.qrr", VFlowSubjectForSolvingTypes::c_Types, &VJoint::m_BindPose);
 		m_pScene->SetFrame(TestSubject::Frame(items));
 	}
+
+private:
+	/// Rotation vector and translation of a root without a pose of its own before them.
+	static void TurnToYUp(std::vector<double>& io_rPose)
+	{
+		const auto part = [&](std::size_t i_Index) { return static_cast<float>(io_rPose[i_Index]); };
+		const QQuaternion turn = QQuaternion::fromAxisAndAngle(1, 0, 0, -90);
+		const QVector3D rotation(part(0), part(1), part(2));
+		QVector3D axis;
+		float degrees = 0.0f;
+		(turn * QQuaternion::fromAxisAndAngle(rotation, qRadiansToDegrees(rotation.length())))
+		    .getAxisAndAngle(&axis, &degrees);
+		const QVector3D place = turn.rotatedVector({part(3), part(4), part(5)});
+		for (int i = 0; i < 3; ++i)
+		{
+			io_rPose[static_cast<std::size_t>(i)] = static_cast<double>(axis[i] * qDegreesToRadians(degrees));
+			io_rPose[static_cast<std::size_t>(i) + 3] = static_cast<double>(place[i]);
+		}
+	}
 };
+INSTANTIATE_IN_BOTH_DIALECTS(Pictures);
 
 VSubjectOptions Only(const std::function<void(VSubjectOptions&)>& i_rSwitchOn)
 {
@@ -73,7 +100,7 @@ VSubjectOptions Only(const std::function<void(VSubjectOptions&)>& i_rSwitchOn)
 
 const VView c_Small{{0, 170, 110}, 460.0f, -65.0f, 60.0f};
 
-TEST_F(Pictures, OfEachThingThatASubjectIsDrawnAs)
+TEST_P(Pictures, OfEachThingThatASubjectIsDrawnAs)
 {
 	const struct
 	{
@@ -105,7 +132,7 @@ TEST_F(Pictures, OfEachThingThatASubjectIsDrawnAs)
 			ASSERT_EQ(nothing.pixel(x, y), 0xff202020u) << x << " " << y;
 }
 
-TEST_F(Pictures, OfMissingMarkers)
+TEST_P(Pictures, OfMissingMarkers)
 {
 	const CoreOrlexTypes::VReconstructionLabelSet labels{
 	    {{TestSubject::c_Id, 0, {0, 320, 130}}, {TestSubject::c_Id, 1, {10, 360, 190}}}};
@@ -126,7 +153,7 @@ TEST_F(Pictures, OfMissingMarkers)
 	Compare(Draw(near), "sticks-during-gaps");
 }
 
-TEST_F(Pictures, OfTranslucentBonesBesideASource)
+TEST_P(Pictures, OfTranslucentBonesBesideASource)
 {
 	ShowSmall();
 	const auto bones = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; });
@@ -137,7 +164,7 @@ TEST_F(Pictures, OfTranslucentBonesBesideASource)
 	EXPECT_NE(Draw(c_Small), dual) << "alone it is opaque";
 }
 
-TEST_F(Pictures, OfSourceAndTarget)
+TEST_P(Pictures, OfSourceAndTarget)
 {
 	ASSERT_NO_FATAL_FAILURE(ShowDemo());
 	Options().m_bFloorGrid = Options().m_bGlobalAxis = true;
@@ -150,24 +177,118 @@ TEST_F(Pictures, OfSourceAndTarget)
 	Compare(Draw(whole), "target");
 }
 
-TEST_F(Pictures, OfOutlines)
+TEST_P(Pictures, OfSourceAndTargetFromEachSide)
 {
-	ShowSmall();
-	Options().m_SolvingSubject = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; });
-	const VSubjectSelectionMaker<VFlowSubjectForSolvingTypes> items;
-	m_pSelection->Selection().Replace({items.Segment(TestSubject::c_Id, TestSubject::ERoot)});
-	Compare(Draw(c_Small), "selected");
-	m_pSelection->Selection().Add({items.Segment(TestSubject::c_Id, TestSubject::ELimb)});
-	Compare(Draw(c_Small), "selected-two");
-	m_pSelection->PreSelection().Replace({items.Segment(TestSubject::c_Id, TestSubject::ESpine)});
-	for (std::uint32_t modifier = 0; modifier < 4; ++modifier)
+	const char* const c_Names[CoreGraphics::ECameraTypeCount] = {
+	    "perspective", "front", "back", "left", "right", "top", "bottom"};
+	Options().m_bFloorGrid = Options().m_bGlobalAxis = true;
+	Options().m_FloorGridSize = 2.0f;
+	Options().m_LabellingSubject.m_bMarkers = Options().m_LabellingSubject.m_bSticks = false;
+	for (const bool bYUp : {false, true})
 	{
-		m_Renderer.m_Input.m_ModifierState = modifier;
-		Compare(Draw(c_Small), "preselected-" + std::to_string(modifier));
+		ASSERT_NO_FATAL_FAILURE(ShowDemo(bYUp));
+		const QVector3D middle = bYUp ? QVector3D(0, 900, 0) : QVector3D(0, 0, 900);
+		// The other views are the same arithmetic in both dialects.
+		const bool bES2 = GetParam() == GraphicsTest::EDialect::ES2;
+		for (std::uint32_t type = 0; type < (bES2 ? 1u : CoreGraphics::ECameraTypeCount); ++type)
+			Compare(Draw({middle, 3000.0f, -75.0f, 30.0f, type, 9.0f}),
+			    std::string(bYUp ? "y-up-" : "z-up-") + c_Names[type]);
 	}
 }
 
-TEST_F(Pictures, TakeNoMemoryForAFrameThatDoesNotChange)
+TEST_P(Pictures, OfOutlines)
+{
+	ShowSmall();
+	Options().m_SolvingSubject = Only(
+	    [](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = o_rOptions.m_bTargets = o_rOptions.m_bJoints = true; });
+	const VSubjectSelectionMaker<VFlowSubjectForSolvingTypes> items;
+	const auto segment = [&](std::uint32_t i_Index) { return items.Segment(TestSubject::c_Id, i_Index); };
+	const NVX::ISelectionItem root = segment(TestSubject::ERoot), spine = segment(TestSubject::ESpine),
+	                          limb = segment(TestSubject::ELimb), body = items.Target(TestSubject::c_Id, 2),
+	                          rotation = items.Target(TestSubject::c_Id, 1), subject = items.Subject(TestSubject::c_Id);
+	const struct
+	{
+		const char* m_pName;
+		std::vector<NVX::ISelectionItem> m_Selected;
+		std::vector<NVX::ISelectionItem> m_Preselected = {};
+		std::uint32_t m_Modifier = CoreGraphics::EModifierNone;
+	} c_Rows[] = {
+	    {"selected", {spine}},
+	    {"selected-two", {spine, limb}},
+	    {"selected-of-other-kinds", {subject, rotation, body}},
+	    {"preselected", {limb}, {spine}},
+	    {"preselected-to-add", {limb}, {spine}, CoreGraphics::EModifierAdd},
+	    {"preselected-to-subtract", {limb}, {limb}, CoreGraphics::EModifierSubtract},
+	    {"preselected-to-toggle", {limb}, {limb, spine}, CoreGraphics::EModifierToggle},
+	    {"preselected-primary", {spine, limb, root}, {spine}},
+	    {"preselected-of-other-kinds", {}, {subject, rotation, body}, CoreGraphics::EModifierAdd},
+	};
+	for (const auto& rRow : c_Rows)
+	{
+		m_pSelection->Selection().Replace(rRow.m_Selected);
+		m_pSelection->PreSelection().Replace(rRow.m_Preselected);
+		m_Renderer.m_Input.m_ModifierState = rRow.m_Modifier;
+		Compare(Draw(c_Small), rRow.m_pName);
+	}
+}
+
+TEST_P(Pictures, OfTheManipulator)
+{
+	using namespace OrlexGraphics;
+	const struct
+	{
+		const char* m_pName;
+		std::uint32_t m_ModeMask;
+		std::optional<VManipulatorHandle> m_Hovered = {};
+		/// How far the mouse then drags it, from above the middle of the picture.
+		std::optional<QPoint> m_Drag = {};
+		std::uint32_t m_Type = CoreGraphics::ECameraPerspective;
+		float m_Scale = 1.0f;
+	} c_Rows[] = {
+	    {"manipulator", 7},
+	    {"manipulator-arrows", 1},
+	    {"manipulator-planes", 2},
+	    {"manipulator-rings", 4},
+	    {"manipulator-arrow-hover", 7, VManipulatorHandle{EManipulatorArrow, 1}},
+	    {"manipulator-plane-hover", 7, VManipulatorHandle{EManipulatorPlane, 2}},
+	    {"manipulator-ring-hover", 7, VManipulatorHandle{EManipulatorRing, 0}},
+	    {"manipulator-arrow-drag", 7, VManipulatorHandle{EManipulatorArrow, 1}, QPoint(-40, 0)},
+	    {"manipulator-plane-drag", 7, VManipulatorHandle{EManipulatorPlane, 2}, QPoint(-30, 10)},
+	    {"manipulator-ring-drag", 4, VManipulatorHandle{EManipulatorRing, 0}, QPoint(30, 30)},
+	    {"manipulator-front", 7, {}, {}, CoreGraphics::ECameraFront},
+	    {"manipulator-small", 7, {}, {}, CoreGraphics::ECameraPerspective, 0.4f},
+	};
+	ShowSmall();
+	Options().m_SolvingSubject = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; });
+	VRenderManipulator& rManipulator = *m_pScene->RenderManipulator();
+	QMatrix4x4 transform;
+	transform.translate(10, 170, 130);
+	for (const auto& rRow : c_Rows)
+	{
+		VView view = c_Small;
+		view.m_Centre = transform.column(3).toVector3D();
+		view.m_Type = rRow.m_Type;
+		view.m_Scale = 1.0f;
+		rManipulator.SetTransform(transform);
+		rManipulator.SetVisible(true);
+		rManipulator.SetModeMask(rRow.m_ModeMask);
+		Options().m_ManipulatorScale = rRow.m_Scale;
+		m_pSelection->PreSelection().Replace({});
+		if (rRow.m_Hovered)
+			m_pSelection->PreSelection().Replace({HandleItem(*rRow.m_Hovered)});
+		if (rRow.m_Drag)
+		{
+			const CoreGraphics::VCameraController& rCamera = SetView(view);
+			rManipulator.Press(rCamera, {160, 70});
+			rManipulator.Drag(rCamera, QPoint(160, 70) + *rRow.m_Drag, {});
+			ASSERT_TRUE(rManipulator.IsDragging()) << rRow.m_pName;
+		}
+		Compare(Draw(view), rRow.m_pName);
+		rManipulator.Release();
+	}
+}
+
+TEST_P(Pictures, TakeNoMemoryForAFrameThatDoesNotChange)
 {
 	ASSERT_NO_FATAL_FAILURE(ShowDemo());
 	VSubjectOptions& rOptions = Options().m_SolvingSubject;
@@ -180,7 +301,7 @@ TEST_F(Pictures, TakeNoMemoryForAFrameThatDoesNotChange)
 	EXPECT_EQ(AllocationCount() - before, 0u);
 }
 
-TEST_F(Pictures, PicksFindWhatIsSeen)
+TEST_P(Pictures, PicksFindWhatIsSeen)
 {
 	ShowSmall();
 	Options().m_SolvingSubject =

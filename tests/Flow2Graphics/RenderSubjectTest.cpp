@@ -185,7 +185,7 @@ TEST_F(RenderSubject, ItemsHaveNamesBoundsAndPlaces)
 	EXPECT_EQ(m_Registry.GetName(SegmentId(ELimb)), "Ann : Limb");
 	EXPECT_EQ(m_Registry.GetName(Data().m_Id.m_Id), "Ann");
 	ExpectVector(*m_Registry.GetItemBound(m_pMaker->Subject(c_Id)), {10, 20, 30, 1000});
-	ExpectVector(*m_Registry.GetItemBound(m_pMaker->Segment(c_Id, EStub)), {10, 20, 130, 5});
+	ExpectVector(*m_Registry.GetItemBound(m_pMaker->Segment(c_Id, EShort)), {10, 20, 130, 5});
 	ExpectMatrix(
 	    *m_Registry.GetItemMatrix(m_pMaker->Segment(c_Id, ELimb)), {0, 1, 0}, {-1, 0, 0}, {0, 0, 1}, {10, 320, 130});
 

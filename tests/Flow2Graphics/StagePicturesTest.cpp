@@ -56,6 +56,10 @@ protected:
 	std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>> m_Items;
 };
 
+// Those of subjects are drawn in both dialects.
+INSTANTIATE_TEST_SUITE_P(
+    Dialects, StagePictures, testing::Values(GraphicsTest::EDialect::Desktop), GraphicsTest::DialectName);
+
 template <typename T>
 bool Is(const OrlexGraphics::IRenderType& i_rType)
 {
@@ -67,43 +71,40 @@ const VView c_Below{{0, 0, 0}, 7000.0f, -115.0f, 30.0f};
 
 } // namespace
 
-TEST_F(StagePictures, OfTheFloor)
+TEST_P(StagePictures, OfTheFloor)
 {
 	const struct
 	{
 		const char* m_pName;
 		bool m_bYUp;
 		bool m_bTranslucent;
-		std::uint32_t m_Type;
 		VView m_View;
 	} c_Rows[] = {
-	    {"floor-above", false, true, CoreGraphics::ECameraPerspective, c_Above},
-	    {"floor-below", false, true, CoreGraphics::ECameraPerspective, c_Below},
-	    {"floor-above-y-up", true, true, CoreGraphics::ECameraPerspective, c_Above},
-	    {"floor-below-y-up", true, true, CoreGraphics::ECameraPerspective, c_Below},
-	    {"floor-above-opaque", false, false, CoreGraphics::ECameraPerspective, c_Above},
-	    {"floor-below-opaque", false, false, CoreGraphics::ECameraPerspective, c_Below},
-	    {"floor-front", false, true, CoreGraphics::ECameraFront, {}},
-	    {"floor-back", false, true, CoreGraphics::ECameraBack, {}},
-	    {"floor-left", false, true, CoreGraphics::ECameraLeft, {}},
-	    {"floor-right", false, true, CoreGraphics::ECameraRight, {}},
-	    {"floor-top", false, true, CoreGraphics::ECameraTop, {}},
-	    {"floor-bottom", false, true, CoreGraphics::ECameraBottom, {}},
-	    {"floor-top-y-up", true, true, CoreGraphics::ECameraTop, {}},
+	    {"floor-above", false, true, c_Above},
+	    {"floor-below", false, true, c_Below},
+	    {"floor-above-y-up", true, true, c_Above},
+	    {"floor-below-y-up", true, true, c_Below},
+	    {"floor-above-opaque", false, false, c_Above},
+	    {"floor-below-opaque", false, false, c_Below},
+	    {"floor-front", false, true, {.m_Type = CoreGraphics::ECameraFront}},
+	    {"floor-back", false, true, {.m_Type = CoreGraphics::ECameraBack}},
+	    {"floor-left", false, true, {.m_Type = CoreGraphics::ECameraLeft}},
+	    {"floor-right", false, true, {.m_Type = CoreGraphics::ECameraRight}},
+	    {"floor-top", false, true, {.m_Type = CoreGraphics::ECameraTop}},
+	    {"floor-bottom", false, true, {.m_Type = CoreGraphics::ECameraBottom}},
+	    {"floor-top-y-up", true, true, {.m_Type = CoreGraphics::ECameraTop}},
 	};
 	for (const auto& rRow : c_Rows)
 	{
 		SCOPED_TRACE(rRow.m_pName);
 		m_pScene->SetYUp(rRow.m_bYUp);
 		Options().m_bFloorGridIsTranslucent = rRow.m_bTranslucent;
-		Options().m_FloorGridSize = rRow.m_Type == CoreGraphics::ECameraPerspective ? 6.0f : 2.0f;
-		m_Renderer.m_Input.m_Camera.m_Type = rRow.m_Type;
-		m_Renderer.m_Input.m_Camera.m_OrthographicScale = 10.0f;
+		Options().m_FloorGridSize = rRow.m_View.m_Type == CoreGraphics::ECameraPerspective ? 6.0f : 2.0f;
 		Compare(Draw(rRow.m_View), rRow.m_pName);
 	}
 }
 
-TEST_F(StagePictures, OfVolumes)
+TEST_P(StagePictures, OfVolumes)
 {
 	auto pSet = std::make_shared<Flow2Utils::VParameterSet>();
 	const std::pair<const char*, float> c_Limits[] = {{"MinReconX", -2000.0f}, {"MinReconY", -2000.0f},
@@ -121,6 +122,11 @@ TEST_F(StagePictures, OfVolumes)
 	const VView view{{0, 0, 1000}, 8500.0f, -70.0f, 30.0f};
 	Compare(Draw(view), "volumes");
 	ExpectNoAllocation();
+	m_pSelection->PreSelection().Replace(
+	    {m_pScene->RenderHotspotVolumeManipulator()->HandleItem({OrlexGraphics::EVolumeFace, 5})});
+	m_pScene->SetYUp(true);
+	Compare(Draw({{0, 1000, 0}, 8500.0f, -70.0f, 30.0f}), "volumes-y-up-hover");
+	m_pScene->SetYUp(false);
 	Options().m_bManipulator = false;
 	Compare(Draw(view), "reconstruction-volume");
 	Options().m_bReconstructionVolume = Options().m_bFloorGrid = Options().m_bGlobalAxis = false;
@@ -128,7 +134,7 @@ TEST_F(StagePictures, OfVolumes)
 	EXPECT_EQ(nothing.pixel(160, 120), 0xff202020u);
 }
 
-TEST_F(StagePictures, OfPlatesPointsAndGeometry)
+TEST_P(StagePictures, OfPlatesPointsAndGeometry)
 {
 	OrlexGraphics::VForcePlate left, right;
 	left.m_Transform.translate(-250, 0, 0);
@@ -148,7 +154,7 @@ TEST_F(StagePictures, OfPlatesPointsAndGeometry)
 	ExpectNoAllocation();
 }
 
-TEST_F(StagePictures, OfTextWhereItStands)
+TEST_P(StagePictures, OfTextWhereItStands)
 {
 	VGeometry geometry;
 	geometry.m_Texts = {{QStringLiteral("HHHH"), QVector3D(0, 0, 0), {1, 0, 0, 1}, false},
@@ -176,7 +182,7 @@ TEST_F(StagePictures, OfTextWhereItStands)
 	EXPECT_GT(extent(qGreen).width(), 15);
 }
 
-TEST_F(StagePictures, AreDrawnInTheirOrder)
+TEST_P(StagePictures, AreDrawnInTheirOrder)
 {
 	using namespace OrlexGraphics;
 	bool (*const c_Order[])(const IRenderType&) = {Is<VRenderFloorGrid>, Is<VRenderForcePlates>,

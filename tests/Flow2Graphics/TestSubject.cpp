@@ -20,7 +20,7 @@ VSubject Make()
 		VJoint::EJointType m_Joint;
 	} c_Segments[] = {{"Root", CoreOrlexTypes::c_NoParent, {0, 0, 0}, VJoint::EFree},
 	    {"Spine", ERoot, {0, 0, 100}, VJoint::EBall}, {"Limb", ESpine, {300, 0, 0}, VJoint::EHinge},
-	    {"Tip", ELimb, {0, 50, 0}, VJoint::EDummy}, {"Stub", ESpine, {0, 0, 0}, VJoint::EDummy}};
+	    {"Tip", ELimb, {0, 50, 0}, VJoint::EDummy}, {"Short", ESpine, {0, 0, 0}, VJoint::EDummy}};
 	for (const auto& rRow : c_Segments)
 	{
 		VSubject::VSegment segment;

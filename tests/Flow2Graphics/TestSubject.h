@@ -21,7 +21,7 @@ enum ESegment : std::uint32_t
 	ESpine,
 	ELimb,
 	ETip,
-	EStub,
+	EShort,
 	ESegmentCount
 };
 
@@ -34,7 +34,7 @@ enum ETarget : std::uint32_t
 };
 
 CoreOrlexTypes::VSubject Make();
-/// Shorter than the subject: the stub has none.
+/// Shorter than the subject: the segment without length has none.
 CoreOrlexTypes::VSubjectApplicationData MakeData();
 /// A quarter turn about Z at (10, 20, 30).
 CoreOrlexTypes::VSubjectDynamicParameters MakePose();
