@@ -142,6 +142,42 @@ TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
 	EXPECT_EQ(Pick({10, 10}, QPoint(150, 100)), (std::vector<std::uint32_t>{1, 2}));
 }
 
+TEST_P(Offscreen, PicksRectanglesExactlyOrThroughLayers)
+{
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {30, 30, 20, 20}, 10.0f},
+	    {Item(3), {100, 20, 40, 40}}, {Item(4), {103, 23, 34, 34}, -10.0f}};
+	const struct
+	{
+		const char* m_pName;
+		QPoint m_A;
+		QPoint m_B;
+		std::vector<std::uint32_t> m_Layers;
+		std::vector<std::uint32_t> m_Exact;
+	} rows[] = {
+	    {"both", {10, 10}, {70, 70}, {1, 2}, {1, 2}},
+	    {"within the nearer one", {35, 35}, {45, 45}, {2, 1}, {2}},
+	    {"a hidden one", {110, 30}, {130, 50}, {3, 4}, {3}},
+	    {"beside it by a scaled pixel", {64, 10}, {96, 70}, {}, {}},
+	};
+	for (const std::uint32_t type : {CoreGraphics::ECameraFront, CoreGraphics::ECameraPerspective})
+	{
+		// From the front, 4 mm a pixel in the plane of the boxes. Its scale of an exact pick is below a half.
+		CoreGraphics::VCameraController& rCamera = m_Renderer.m_Input.m_Camera;
+		rCamera.m_Type = type;
+		rCamera.m_Pitch = -90.0f;
+		rCamera.m_Yaw = 180.0f;
+		rCamera.m_Distance = 772.5f;
+		Frame();
+		for (const auto& rRow : rows)
+			for (const bool bExact : {false, true})
+			{
+				m_pScene->m_bExactPick = bExact;
+				EXPECT_EQ(Pick(rRow.m_B, rRow.m_A), bExact ? rRow.m_Exact : rRow.m_Layers)
+				    << rRow.m_pName << (bExact ? ", exactly" : ", through layers");
+			}
+	}
+}
+
 TEST_P(Offscreen, DrawsSpheresByTheirSizeOnScreen)
 {
 	m_pScene->m_Radii = {0.0f, 0.5f, 1.3f, 3.0f, 9.0f};

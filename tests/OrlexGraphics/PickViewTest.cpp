@@ -1,3 +1,5 @@
+#include "InMemoryHost/PreferenceFolders.h"
+#include "OrlexGraphics/TesselInteractionMapper.h"
 #include "ViewFixture.h"
 
 #include <QSignalSpy>
@@ -81,6 +83,7 @@ TEST_F(VViewTest, SelectsARectangleThroughSixteenLayers)
 		m_pScene->m_Next.m_Boxes.push_back({Item(i), {40, 40, 40, 40}, -10.0f * static_cast<float>(i)});
 	m_pScene->m_Next.m_Boxes.push_back({Item(90), {140, 40, 20, 20}});
 	m_pScene->m_Next.m_Boxes.push_back({Item(91, 28), {50, 50, 10, 10}, 500.0f});
+	m_pScene->m_Next.m_Boxes.push_back({Item(92, 34), {65, 65, 10, 10}, 500.0f});
 	Show();
 
 	Press({30, 30}, Qt::AltModifier);
@@ -90,10 +93,10 @@ TEST_F(VViewTest, SelectsARectangleThroughSixteenLayers)
 	Drag({110, 110}, Qt::AltModifier);
 	Release({110, 110}, Qt::AltModifier);
 	ASSERT_TRUE(Commit());
-	// The handle is in front of all and takes a place in the first layer.
+	// The handles are in front of all and take a place in the first layer.
 	Indices expected(16);
 	std::iota(expected.begin(), expected.end(), 0u);
-	EXPECT_EQ(Selected(), expected) << "no handle, nothing behind the layers, nothing beside the rectangle";
+	EXPECT_EQ(Selected(), expected) << "no handles, nothing behind the layers, nothing beside the rectangle";
 
 	// The other way round, over the lower right corner and with Shift at the release alone.
 	Press({165, 65}, Qt::AltModifier);
@@ -114,15 +117,67 @@ TEST_F(VViewTest, SelectsARectangleThroughSixteenLayers)
 	Press({30, 30}, Qt::AltModifier);
 	Release({110, 110}, Qt::AltModifier);
 	ASSERT_TRUE(Commit());
-	EXPECT_EQ(Selected(), Indices{0}) << "one layer alone, but for the handle";
+	EXPECT_EQ(Selected(), Indices{0}) << "one layer alone, but for the handles";
 }
 
 TEST_F(VViewTest, PicksHandlesByPointOnly)
 {
-	m_pScene->m_Next.m_Boxes = {{Item(1, 28), {20, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1, 28), {20, 20, 40, 40}}, {Item(2, 34), {100, 20, 40, 40}}};
+	m_pSelection->Selection().Replace({Item(9)});
 	Show();
-	Hover({40, 40});
-	EXPECT_TRUE(Until([&] { return Preselected() == Indices{1}; }));
+	for (const std::uint32_t index : {1u, 2u})
+	{
+		const QPoint where(80 * static_cast<int>(index) - 40, 40);
+		Hover(where);
+		EXPECT_TRUE(Until([&] { return Preselected() == Indices{index}; }));
+		// Nobody takes the press here: what the handle is for stays selected.
+		Click(where);
+		ASSERT_TRUE(Commit());
+		EXPECT_EQ(Selected(), Indices{9});
+		EXPECT_TRUE(Preselected().empty());
+	}
+}
+
+TEST_F(VViewTest, SwapsTheMouseByThePreference)
+{
+	const auto pPreferences = std::make_shared<InMemoryHost::VPreferenceFolders>();
+	m_pMapper = NVX::MakeShared<OrlexGraphics::VTesselInteractionMapper>(pPreferences, m_pDispatcher);
+	CoreGraphics::VInteractionMapper::SetActive(m_pMapper);
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
+	Show();
+	m_pView->SetCameraType(CoreGraphics::ECameraPerspective);
+	const auto drag = [&](Qt::KeyboardModifiers i_Modifiers)
+	{
+		const float yaw = m_pView->Camera().m_Yaw;
+		Press({10, 100}, i_Modifiers);
+		Drag({30, 100}, i_Modifiers);
+		const bool bRectangle = m_pView->MouseState() == OrlexGraphics::EMouseDragging;
+		Release({30, 100}, i_Modifiers);
+		EXPECT_TRUE(Commit());
+		EXPECT_EQ(m_pView->Camera().m_Yaw != yaw, !bRectangle);
+		return bRectangle;
+	};
+	for (const std::int32_t number : {1, 0, 1})
+	{
+		pPreferences->SetNumber(TesselPluginInterface::c_NavigationAltKey, number);
+		QCoreApplication::processEvents();
+		EXPECT_EQ(drag({}), number == 0);
+		EXPECT_EQ(drag(Qt::AltModifier), number == 1);
+	}
+	// A click is a click with either of them.
+	m_pView->SetCameraType(CoreGraphics::ECameraFront);
+	for (const std::int32_t number : {0, 1})
+	{
+		pPreferences->SetNumber(TesselPluginInterface::c_NavigationAltKey, number);
+		QCoreApplication::processEvents();
+		for (const auto& [x, modifiers, index] :
+		    {std::tuple(40, Qt::KeyboardModifiers(), 1u), {120, Qt::AltModifier, 2u}})
+		{
+			Click({x, 40}, modifiers);
+			ASSERT_TRUE(Commit());
+			EXPECT_EQ(Selected(), Indices{index});
+		}
+	}
 }
 
 TEST_F(VViewTest, ShowsWhatTheMousePointsAt)

@@ -114,6 +114,16 @@ TEST(SelectionRegistry, MarksWhatIsSelected)
 		++id;
 	}
 	EXPECT_TRUE(registry.HasFlagged());
+
+	// Handles show by their colour, not by an outline.
+	for (const std::uint32_t kind : {28u, 34u})
+	{
+		const ISelectionItem handle{kind, 0, 1, {}};
+		registry.SetSelection({handle}, {});
+		registry.Reset();
+		EXPECT_EQ(registry.GetId(handle).m_Id, 0x200001u);
+		EXPECT_FALSE(registry.HasFlagged()) << kind;
+	}
 }
 
 TEST(SelectionRegistry, LeavesOutOfPicksWhatIsExcludedOrElsewhere)

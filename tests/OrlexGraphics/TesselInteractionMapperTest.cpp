@@ -1,26 +1,11 @@
 #include "OrlexGraphics/TesselInteractionMapper.h"
 #include "InMemoryHost/Dispatcher.h"
-#include "TesselPluginInterface/IPreferenceFolders.h"
+#include "InMemoryHost/PreferenceFolders.h"
 
 #include <gtest/gtest.h>
 
 namespace
 {
-
-class VPreferences : public TesselPluginInterface::IPreferenceFolders
-{
-public:
-	boost::filesystem::path Folder(const std::string& /*i_rKey*/) const override { return {}; }
-	std::int32_t Number(const std::string& i_rKey, std::int32_t i_Default) const override
-	{
-		return i_rKey == TesselPluginInterface::c_NavigationAltKey && m_bSet ? m_Value : i_Default;
-	}
-	NVX::VSignal<std::string>& ChangedSignal() override { return m_ChangedSignal; }
-
-	bool m_bSet = false;
-	std::int32_t m_Value = 0;
-	NVX::VSignal<std::string> m_ChangedSignal;
-};
 
 constexpr std::uint32_t c_Left = 1, c_Right = 2, c_Middle = 4, c_Alt = 0x8000000, c_Shift = 0x2000000;
 
@@ -38,7 +23,7 @@ std::string Actions(
 TEST(TesselInteractionMapper, MapsButtonsByTheAltPreference)
 {
 	const auto pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
-	const auto pPreferences = std::make_shared<VPreferences>();
+	const auto pPreferences = std::make_shared<InMemoryHost::VPreferenceFolders>();
 	const auto pMapper = NVX::MakeShared<OrlexGraphics::VTesselInteractionMapper>(pPreferences, pDispatcher);
 	const struct
 	{
@@ -70,11 +55,11 @@ TEST(TesselInteractionMapper, MapsButtonsByTheAltPreference)
 	};
 	check(true);
 
-	pPreferences->m_bSet = true;
-	pPreferences->ChangedSignal().Fire("FolderSkins");
+	pPreferences->SetNumber("Another", 0);
 	pDispatcher->RunPending();
 	check(true);
-	pPreferences->ChangedSignal().Fire(TesselPluginInterface::c_NavigationAltKey);
+	pPreferences->SetNumber(TesselPluginInterface::c_NavigationAltKey, 0);
+	check(true);
 	pDispatcher->RunPending();
 	check(false);
 }

@@ -59,8 +59,7 @@ void VFrameRenderer::Pick(const VPickRequest& i_rRequest, VPick& o_rPick)
 	o_rPick.m_Names.clear();
 	o_rPick.m_Items = m_pScene->MakeSelection(m_PickedIds, o_rPick.m_Names);
 	if (i_rRequest.m_bRectangle)
-		std::erase_if(o_rPick.m_Items,
-		    [](const NVX::ISelectionItem& i_rItem) { return i_rItem.m_Kind == ESelectionManipulatorHandle; });
+		std::erase_if(o_rPick.m_Items, [](const NVX::ISelectionItem& i_rItem) { return IsHandle(i_rItem.m_Kind); });
 }
 
 void VFrameRenderer::ReadIds(const QRect& i_rRectangle)

@@ -104,7 +104,10 @@ void VSceneFramebufferObject::CommitPick(const VPick& i_rPick, const VPickReques
 	    [this, pManager = m_pScene->SelectionManager(), items = i_rPick.m_Items, modifiers = m_ReleaseModifierState,
 	        bCameraView = IsCameraView()]
 	    {
-		    Apply(pManager->Selection(), items, modifiers, bCameraView);
+		    // A click that was faster than the hovering before it would take the selection from under the manipulator.
+		    if (std::none_of(items.begin(), items.end(),
+		            [](const NVX::ISelectionItem& i_rItem) { return IsHandle(i_rItem.m_Kind); }))
+			    Apply(pManager->Selection(), items, modifiers, bCameraView);
 		    pManager->PreSelection().Replace({});
 		    SetToolTipText(QString());
 		    SetShowCameraNumbers(false);

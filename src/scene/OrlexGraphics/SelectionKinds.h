@@ -19,6 +19,13 @@ enum ESceneSelectionKind : std::uint32_t
 	ESelectionForcePlate = 36
 };
 
+/// Handles are for the mouse to drag: they are picked by a point alone, and are neither selected with other things nor
+/// outlined.
+constexpr bool IsHandle(std::uint32_t i_Kind)
+{
+	return i_Kind == ESelectionManipulatorHandle || i_Kind == ESelectionVolumeManipulatorHandle;
+}
+
 /// Whether items of a kind take one id for each of their children, whose number the picked item carries.
 constexpr bool HasChildren(std::uint32_t i_Kind)
 {

@@ -88,7 +88,7 @@ CoreGraphics::VSelectionId VSelectionRegistry::GetId(const NVX::ISelectionItem& 
 	if (id == 0 || flags == m_Flags.end())
 		return CoreGraphics::MakeSelectionId(id);
 	// The handles are not drawn in the id frame: they show by their colour.
-	if (i_rItem.m_Kind != ESelectionManipulatorHandle)
+	if (!IsHandle(i_rItem.m_Kind))
 		m_FlaggedIds.push_back(id);
 	return CoreGraphics::MakeSelectionId(id | flags->second);
 }
