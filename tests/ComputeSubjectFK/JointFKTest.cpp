@@ -11,8 +11,8 @@ namespace
 {
 
 using namespace ComputeSubject;
+using Reference::c_Pi;
 using Reference::VJointTypes;
-constexpr double c_Pi = std::numbers::pi;
 
 CoreOrlexTypes::VSubject::VJoint Joint(Reference::EJointType i_Type)
 {

@@ -18,7 +18,6 @@ using namespace Reference;
 using Eigen::Matrix3d;
 using Eigen::Vector3d;
 using Rotation::VVector3;
-constexpr double c_Pi = std::numbers::pi;
 
 struct VRevolutionRow
 {

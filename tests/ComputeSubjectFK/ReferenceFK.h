@@ -5,6 +5,7 @@
 
 #include <Eigen/Geometry>
 
+#include <numbers>
 #include <random>
 #include <string>
 #include <vector>
@@ -14,9 +15,12 @@
 namespace Reference
 {
 
+using CoreOrlexTypes::c_NoParent;
 using CoreOrlexTypes::VSubject;
 using EJointType = CoreOrlexTypes::VSubjectParametrised::VJoint::EJointType;
 using VJointTypes = CoreOrlexTypes::VSubjectParametrised::VJoint;
+
+constexpr double c_Pi = std::numbers::pi;
 
 VSubject::VSegment Segment(
     std::uint32_t i_Parent, EJointType i_Type, std::array<double, 3> i_PreTranslation = {0.0, 0.0, 0.0});

@@ -12,8 +12,6 @@ namespace
 
 using namespace ComputeSubject;
 using namespace Reference;
-constexpr double c_Pi = std::numbers::pi;
-constexpr std::uint32_t c_NoParent = CoreOrlexTypes::c_NoParent;
 
 TEST(SegmentFK, FreeRootAtZeroIsExactlyTheIdentity)
 {

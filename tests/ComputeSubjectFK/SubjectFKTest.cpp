@@ -13,7 +13,6 @@ namespace
 using namespace ComputeSubject;
 using namespace Reference;
 using VTarget = VSubject::VTarget;
-constexpr std::uint32_t c_NoParent = CoreOrlexTypes::c_NoParent;
 
 struct VEmptyRow
 {

@@ -14,7 +14,6 @@ using namespace ComputeSubject;
 using namespace Reference;
 using VTarget = VSubject::VTarget;
 using Eigen::Vector3d;
-constexpr double c_Pi = std::numbers::pi;
 
 /// Two segments with everything set, so that a pose left out shows.
 VSubject Skeleton()

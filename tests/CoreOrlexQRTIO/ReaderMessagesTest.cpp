@@ -68,7 +68,7 @@ std::string Component(const std::string& i_rAttributes)
 	    + i_rAttributes + "/></PcaControlledParams>");
 }
 
-struct VRow
+struct VMessageRow
 {
 	const char* m_pName;
 	std::string m_Text;
@@ -77,14 +77,14 @@ struct VRow
 	std::uint32_t m_Id = c_TestId;
 };
 
-void PrintTo(const VRow& i_rRow, std::ostream* o_pStream)
+void PrintTo(const VMessageRow& i_rRow, std::ostream* o_pStream)
 {
 	*o_pStream << i_rRow.m_Text;
 }
 
 const VTexts c_None;
 
-const std::vector<VRow> c_Rows{
+const std::vector<VMessageRow> c_MessageRows{
     // The document.
     {"Fine", Document({}), c_None},
     {"Empty", "", {"File has no KinematicModel element"}},
@@ -305,12 +305,12 @@ const std::vector<VRow> c_Rows{
             "'SubjectDynamicSubspace' declared but does not contain any valid 'PcaControlledParams' elements"}},
 };
 
-class ReaderMessage : public testing::TestWithParam<VRow>
+class ReaderMessage : public testing::TestWithParam<VMessageRow>
 {
 };
 
 INSTANTIATE_TEST_SUITE_P(
-    Reader, ReaderMessage, testing::ValuesIn(c_Rows), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
+    Reader, ReaderMessage, testing::ValuesIn(c_MessageRows), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
 
 TEST_P(ReaderMessage, IsTold)
 {

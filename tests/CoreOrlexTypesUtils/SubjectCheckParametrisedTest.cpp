@@ -2,7 +2,7 @@
 
 #include "CoreOrlexTypesUtils/SubjectCheck.h"
 
-namespace
+namespace Parametrised
 {
 
 using namespace CoreOrlexTypesUtils;
@@ -333,4 +333,4 @@ TEST_F(SubjectCheckParametrised, StatisticsThatStopTheConversionAreListed)
 	EXPECT_EQ(Messages(), (VTexts{"Incorrent 'Mean' vector size.", "Incorrect 'Covariance' vector size."}));
 }
 
-} // namespace
+} // namespace Parametrised

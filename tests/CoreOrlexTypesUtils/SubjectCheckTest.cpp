@@ -2,7 +2,7 @@
 
 #include "CoreOrlexTypesUtils/SubjectCheck.h"
 
-namespace
+namespace Checked
 {
 
 using namespace CoreOrlexTypesUtils;
@@ -514,4 +514,4 @@ TEST_F(SubjectCheck, EndsAtTheFirstElementThatFails)
 	EXPECT_EQ(Failing(check), VTexts{"Inconsistent segment index."});
 }
 
-} // namespace
+} // namespace Checked

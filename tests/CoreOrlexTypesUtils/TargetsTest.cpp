@@ -8,7 +8,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace Targets
 {
 
 using namespace CoreOrlexTypesUtils::SubjectParametrisedUtils;
@@ -243,4 +243,4 @@ TEST(JointParameters, CarryStatisticsByName)
 	EXPECT_EQ(to.m_Segments[0].m_Joint.m_Mean, std::vector<double>{1});
 }
 
-} // namespace
+} // namespace Targets

@@ -43,7 +43,7 @@ FBXIO::VSkinSkeleton ScaledArm()
 	return bones;
 }
 
-VSubjectParametrised Build(const FBXIO::VSkinSkeleton& i_rBones, double i_Scale)
+VSubjectParametrised BuildScaled(const FBXIO::VSkinSkeleton& i_rBones, double i_Scale)
 {
 	VSubjectParametrised subject;
 	CoreOrlexTypes::VSubjectApplicationData applicationData;
@@ -98,7 +98,7 @@ TEST(FilePose, MatchingReachesPoseAndLengths)
 	const FBXIO::VSkinSkeleton bones = ScaledArm();
 	for (const double scale : {1.0, 0.25})
 	{
-		VSubjectParametrised subject = Build(bones, scale);
+		VSubjectParametrised subject = BuildScaled(bones, scale);
 		const auto expected = RetargetSetup::PosesInFile(bones, YUp(), scale);
 		ASSERT_TRUE(RetargetSetup::WorstPoseDifference(expected, BindPoses(subject)));
 		const RetargetSetup::VFileMatch match = RetargetSetup::MatchFilePose(subject, bones, YUp());
@@ -115,7 +115,7 @@ TEST(FilePose, MatchingReachesPoseAndLengths)
 TEST(FilePose, MatchingTurnsSegmentsWithoutAJointByTheirPreRotation)
 {
 	const FBXIO::VSkinSkeleton bones = ScaledArm();
-	VSubjectParametrised subject = Build(bones, 1.0);
+	VSubjectParametrised subject = BuildScaled(bones, 1.0);
 	CoreOrlexQRTIO::VSubjectQRTExtras extras;
 	subject.m_Targets.emplace_back().m_SegmentIndices = {2};
 	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
@@ -127,7 +127,7 @@ TEST(FilePose, MatchingTurnsSegmentsWithoutAJointByTheirPreRotation)
 
 TEST(FilePose, MatchingAnotherSkeletonChangesNothing)
 {
-	VSubjectParametrised subject = Build(ScaledArm(), 1.0);
+	VSubjectParametrised subject = BuildScaled(ScaledArm(), 1.0);
 	const VSubjectParametrised before = subject;
 	const RetargetSetup::VFileMatch match = RetargetSetup::MatchFilePose(subject, {MakeBone("root", -1)}, QMatrix4x4());
 	EXPECT_TRUE(match.m_Lengths.empty());

@@ -41,7 +41,7 @@ std::string Attributes(std::size_t i_Count, const std::string& i_rLast)
 	return text + ' ' + i_rLast + "=''/>";
 }
 
-struct VRow
+struct VDocumentRow
 {
 	const char* m_pName;
 	std::string m_Text;
@@ -51,7 +51,7 @@ struct VRow
 
 TEST(Document, TellsWhatIsNoXml)
 {
-	const VRow c_Rows[] = {
+	const VDocumentRow c_Rows[] = {
 	    {"Declaration, comment, instruction", "<?xml version='1.0'?><!-- <b> --><?p <?><a><!--&#0;--></a>", ""},
 	    {"Byte order mark", "\xEF\xBB\xBF<a/>", ""},
 	    {"All of XML's characters", "<a b='\xC3\xA4\xE2\x82\xAC\xF0\x9F\x98\x80&#9;&#x10FFFF;&#228;'/>", ""},
@@ -117,7 +117,7 @@ TEST(Document, TellsWhatIsNoXml)
 	        "line 1: document type that is broken or has an internal subset"},
 	    {"Other declaration", "<!x><a/>", "line 1: element without a name"},
 	};
-	for (const VRow& rRow : c_Rows)
+	for (const VDocumentRow& rRow : c_Rows)
 	{
 		VDocument document;
 		std::string error;

@@ -10,7 +10,7 @@ namespace
 
 using namespace MatrixValidity;
 
-constexpr double c_NaN = std::numeric_limits<double>::quiet_NaN();
+constexpr double c_NotANumber = std::numeric_limits<double>::quiet_NaN();
 constexpr double c_Infinity = std::numeric_limits<double>::infinity();
 
 TEST(MatrixValidity, OfThreeByThree)
@@ -34,8 +34,8 @@ TEST(MatrixValidity, OfThreeByThree)
 	    {"within the tolerance", {1, 0.9e-12, 0, 0, 1, 0, 0, 0, 1}, EFault::ENone, EFault::ENone},
 	    {"beyond it", {1, 0, 0, 0, 1, 0, 1.1e-12, 0, 1}, EFault::ENotSymmetric, EFault::ENotSymmetric},
 	    {"difference overflows", {1, 1e308, 0, -1e308, 1, 0, 0, 0, 1}, EFault::ENotSymmetric, EFault::ENotSymmetric},
-	    {"NaN", {1, 0, 0, 0, c_NaN, 0, 0, 0, 1}, EFault::ENotFinite, EFault::ENotFinite},
-	    {"only NaN", {0, 0, 0, 0, 0, 0, 0, 0, c_NaN}, EFault::ENotFinite, EFault::ENotFinite},
+	    {"NaN", {1, 0, 0, 0, c_NotANumber, 0, 0, 0, 1}, EFault::ENotFinite, EFault::ENotFinite},
+	    {"only NaN", {0, 0, 0, 0, 0, 0, 0, 0, c_NotANumber}, EFault::ENotFinite, EFault::ENotFinite},
 	    {"infinity", {c_Infinity, 0, 0, 0, 1, 0, 0, 0, 1}, EFault::ENotFinite, EFault::ENotFinite},
 	};
 	for (const auto& rRow : rows)
@@ -52,7 +52,7 @@ TEST(MatrixValidity, OfOtherSizes)
 	EXPECT_EQ(one(0.0), EFault::ENone);
 	EXPECT_EQ(one(1e-300), EFault::ENone);
 	EXPECT_EQ(one(-1e-300), EFault::EEigenvalue);
-	EXPECT_EQ(one(c_NaN), EFault::ENotFinite);
+	EXPECT_EQ(one(c_NotANumber), EFault::ENotFinite);
 	std::array<double, 36> six{};
 	for (std::size_t i = 0; i < 6; ++i)
 		six[7 * i] = 1.0;

@@ -124,7 +124,7 @@ std::array<double, 2> EllipseExtents(const VNumbers& i_rEllipseMat)
 }
 
 constexpr const char* c_pUnknownType = "Cannot convert ranges: unsupported joint type";
-constexpr const char* c_pNotFinite = "Cannot convert ranges: a value is not finite";
+constexpr const char* c_pRangeNotFinite = "Cannot convert ranges: a value is not finite";
 
 } // namespace
 
@@ -141,7 +141,7 @@ bool RangeToMinMax(VJoint::EJointType i_JointType, const VNumbers& i_rRangeCente
 	if (!bFits)
 		return false;
 	if (!AllFinite(i_rRangeCenteringState) || !AllFinite(i_rRangeMatrix))
-		return Refuse(c_pNotFinite);
+		return Refuse(c_pRangeNotFinite);
 
 	o_rMin.assign(DoF, 0.0);
 	o_rMax.assign(DoF, 0.0);
@@ -160,7 +160,7 @@ bool RangeToMinMax(VJoint::EJointType i_JointType, const VNumbers& i_rRangeCente
 			o_rMax[i] = i_rRangeCenteringState[i] + extents[i];
 		}
 	}
-	return (AllFinite(o_rMin) && AllFinite(o_rMax)) || Refuse(c_pNotFinite);
+	return (AllFinite(o_rMin) && AllFinite(o_rMax)) || Refuse(c_pRangeNotFinite);
 }
 
 bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const VNumbers& i_rMax,
@@ -184,7 +184,7 @@ bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const
 	if (!bFits)
 		return false;
 	if (!AllFinite(i_rMin) || !AllFinite(i_rMax))
-		return Refuse(c_pNotFinite);
+		return Refuse(c_pRangeNotFinite);
 
 	o_rRangeCenteringState.assign(DoFCount, 0.0);
 	o_rRangeMatrix.assign(DoFCount * DoFCount, 0.0);
@@ -194,7 +194,7 @@ bool MinMaxToRange(VJoint::EJointType i_JointType, const VNumbers& i_rMin, const
 		o_rRangeCenteringState[i] = i_rMin[i] + d * 0.5;
 		o_rRangeMatrix[i * (DoFCount + 1)] = d * d * 0.25;
 	}
-	return (AllFinite(o_rRangeCenteringState) && AllFinite(o_rRangeMatrix)) || Refuse(c_pNotFinite);
+	return (AllFinite(o_rRangeCenteringState) && AllFinite(o_rRangeMatrix)) || Refuse(c_pRangeNotFinite);
 }
 
 } // namespace CoreOrlexTypesUtils::TemplateSubjectUtils

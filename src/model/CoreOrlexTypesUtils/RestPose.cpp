@@ -40,7 +40,7 @@ double VarianceOf(const VStiffnessRule& i_rRule, double i_Stiffness)
 	return deviation * deviation;
 }
 
-constexpr const char* c_pNotFinite = "Cannot convert statistics: a value is not finite";
+constexpr const char* c_pStatisticNotFinite = "Cannot convert statistics: a value is not finite";
 
 /// Relative to the larger of the largest eigenvalue and 1: a rotation that is more certain than that in some direction
 /// is the work of a gimbal lock, where the angles leave one direction out, and rounding would make it negative.
@@ -92,7 +92,7 @@ bool ToRestPose(const VNumbers& i_rMean, const VNumbers& i_rCovariance, VNumbers
 	o_rRestPose = i_rMean;
 	std::copy(angles.begin(), angles.end(), o_rRestPose.begin());
 	if (!AllFinite(o_rRestPose))
-		return Refuse(c_pNotFinite);
+		return Refuse(c_pStatisticNotFinite);
 
 	const VMatrix3 inverse = fnl_svd_fixed<3, 3>(TurnsOfAngles(angles)).Inverse(c_GimbalLock);
 	const VMatrix3 ofAngles = Rotation::Product(
@@ -149,7 +149,7 @@ bool FromRestPose(const VNumbers& i_rRestPose, const VNumbers& i_rStiffness, VNu
 	std::copy(mean.begin(), mean.end(), o_rMean.begin());
 	o_rCovariance.assign(AACovariance.begin(), AACovariance.end());
 	if (!AllFinite(o_rCovariance))
-		return Refuse(c_pNotFinite);
+		return Refuse(c_pStatisticNotFinite);
 	KeepPositive<t_Size>(o_rCovariance);
 	return true;
 }
@@ -165,7 +165,7 @@ bool MeanCovarianceToRestPoseStiffness(VJoint::EJointType i_JointType, const VNu
 	if (!CoreOrlexTypes::IsJointType(i_JointType))
 		return Refuse("Cannot convert statistics: unsupported joint type");
 	if (bFits && (!AllFinite(i_rMeanPose) || !AllFinite(i_rCovariance)))
-		return Refuse(c_pNotFinite);
+		return Refuse(c_pStatisticNotFinite);
 
 	o_rRestPose.assign(Dof, 0.0);
 	o_rStiffness.assign(Dof, 0.0);
@@ -191,7 +191,7 @@ bool RestPoseStiffnessToMeanCovariance(VJoint::EJointType i_JointType, const VNu
 	if (!CoreOrlexTypes::IsJointType(i_JointType))
 		return Refuse("Cannot convert stats: unsupported joint type");
 	if (bFits && (!AllFinite(i_rRestPose) || !AllFinite(i_rStiffness)))
-		return Refuse(c_pNotFinite);
+		return Refuse(c_pStatisticNotFinite);
 
 	o_rMean.assign(DoF, 0.0);
 	o_rCovariance.assign(DoF * DoF, 0.0);

@@ -21,11 +21,11 @@ const QVector4D c_PlateColour(0.35f, 0.4f, 0.45f, 1.0f);
 const QVector4D c_ArrowColour(0.9f, 0.2f, 0.2f, 1.0f);
 
 // Of the arrow, in millimetres.
-constexpr float c_ShaftRadius = 8.0f;
-constexpr float c_HeadRadius = 24.0f;
+constexpr float c_ForceShaftRadius = 8.0f;
+constexpr float c_ForceHeadRadius = 24.0f;
 /// Of its length.
 constexpr float c_HeadPart = 0.2f;
-constexpr int c_Sides = 16;
+constexpr int c_ForceSides = 16;
 
 struct VVertex
 {
@@ -58,24 +58,24 @@ VShape MakeArrow()
 		float m_Z;
 	};
 	const VRing rings[] = {
-	    {c_ShaftRadius, 0.0f}, {c_ShaftRadius, 1.0f - c_HeadPart}, {c_HeadRadius, 1.0f - c_HeadPart}, {0.0f, 1.0f}};
+	    {c_ForceShaftRadius, 0.0f}, {c_ForceShaftRadius, 1.0f - c_HeadPart}, {c_ForceHeadRadius, 1.0f - c_HeadPart}, {0.0f, 1.0f}};
 	std::vector<VVertex> vertices;
 	std::vector<std::uint16_t> indices;
 	for (const VRing& rRing : rings)
 	{
-		for (int i = 0; i < c_Sides; ++i)
+		for (int i = 0; i < c_ForceSides; ++i)
 		{
-			const auto angle = static_cast<float>(2.0 * M_PI * i / c_Sides);
+			const auto angle = static_cast<float>(2.0 * M_PI * i / c_ForceSides);
 			const QVector3D normal(std::cos(angle), std::sin(angle), 0.0f);
 			vertices.push_back({normal * rRing.m_Radius + QVector3D(0.0f, 0.0f, rRing.m_Z), normal, {}});
 		}
 	}
 	for (std::uint16_t ring = 0; ring + 1 < std::uint16_t{std::size(rings)}; ++ring)
 	{
-		for (std::uint16_t i = 0; i < c_Sides; ++i)
+		for (std::uint16_t i = 0; i < c_ForceSides; ++i)
 		{
 			const auto at = [&](int i_Ring, int i_Side)
-			{ return static_cast<std::uint16_t>((ring + i_Ring) * c_Sides + (i + i_Side) % c_Sides); };
+			{ return static_cast<std::uint16_t>((ring + i_Ring) * c_ForceSides + (i + i_Side) % c_ForceSides); };
 			indices.insert(indices.end(), {at(0, 0), at(0, 1), at(1, 1), at(0, 0), at(1, 1), at(1, 0)});
 		}
 	}
@@ -106,7 +106,7 @@ void VRenderForcePlates::AllocateIds()
 		m_pRegistry->SetItemMatrix(item, rPlate.m_Transform);
 		// About the plate's middle, the arrow included.
 		const float radius = std::max(
-		    0.5f * rPlate.m_Size.length(), rPlate.m_CentreOfPressure.length() + rPlate.m_Force.length() + c_HeadRadius);
+		    0.5f * rPlate.m_Size.length(), rPlate.m_CentreOfPressure.length() + rPlate.m_Force.length() + c_ForceHeadRadius);
 		m_pRegistry->SetItemBound(item, QVector4D(rPlate.m_Transform.column(3).toVector3D(), radius));
 		m_Ids.push_back(m_pRegistry->GetId(item));
 	}

@@ -15,7 +15,7 @@ namespace
 {
 
 /// Of the id frame.
-constexpr int c_SelectionUnit = 7;
+constexpr int c_OutlineUnit = 7;
 
 constexpr QVector4D c_PrimaryColour(231.0f / 255.0f, 101.0f / 255.0f, 0.0f, 1.0f);
 
@@ -67,7 +67,7 @@ void VRenderOutlines::Render(
 	const QRect frame = io_rContext.m_Viewport;
 	io_rContext.SetScissor(Inner(rIds, frame, 2));
 	io_rContext.BindFramebuffer(pOutlines);
-	io_rContext.SetUniform(m_Selection, c_SelectionUnit);
+	io_rContext.SetUniform(m_Selection, c_OutlineUnit);
 	io_rContext.SetUniform(m_PrimaryColour, c_PrimaryColour);
 	io_rContext.SetUniform(m_PreselectColour, c_PreselectColours[io_rContext.m_ModifierState % 4]);
 	io_rContext.ApplyState(m_OutlineState);

@@ -24,12 +24,12 @@ using CoreGraphics::VShape;
 namespace
 {
 
-constexpr std::uint32_t c_Sides = 16;
+constexpr std::uint32_t c_VolumeSides = 16;
 
 // Sizes on the screen, in pixels at a scale of 1.
 constexpr float c_ShaftLength = 30.0f;
-constexpr float c_ShaftRadius = 1.0f;
-constexpr float c_HeadRadius = 6.0f;
+constexpr float c_VolumeShaftRadius = 1.0f;
+constexpr float c_VolumeHeadRadius = 6.0f;
 constexpr float c_HeadLength = 18.0f;
 constexpr float c_CornerSide = 10.0f;
 constexpr float c_CentreSide = 14.0f;
@@ -62,7 +62,7 @@ struct VRenderVolumeManipulator::VDrawing
 	explicit VDrawing(CoreGraphics::VShaderLibrary& io_rLibrary)
 	    : m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, "Simple3DModelColour", "Colour")),
 	      m_pLines(io_rLibrary.GetProgram("Simple3DModelWireframe", "UniformColour")),
-	      m_Cylinder(CoreGraphics::MakeCylinder(c_Sides, true)), m_Cone(CoreGraphics::MakeCone(c_Sides, true)),
+	      m_Cylinder(CoreGraphics::MakeCylinder(c_VolumeSides, true)), m_Cone(CoreGraphics::MakeCone(c_VolumeSides, true)),
 	      m_Box(CoreGraphics::MakeBox(false)), m_WireBox(CoreGraphics::MakeBox(true))
 	{
 	}
@@ -274,8 +274,8 @@ void VRenderVolumeManipulator::RenderHandle(VRenderContext& io_rContext, const V
 	};
 	if (i_rHandle.m_Group == EVolumeFace)
 	{
-		draw(rDrawing.m_Cylinder, 0.0f, QVector3D(c_ShaftRadius, c_ShaftRadius, c_ShaftLength));
-		draw(rDrawing.m_Cone, c_ShaftLength, QVector3D(c_HeadRadius, c_HeadRadius, c_HeadLength));
+		draw(rDrawing.m_Cylinder, 0.0f, QVector3D(c_VolumeShaftRadius, c_VolumeShaftRadius, c_ShaftLength));
+		draw(rDrawing.m_Cone, c_ShaftLength, QVector3D(c_VolumeHeadRadius, c_VolumeHeadRadius, c_HeadLength));
 		return;
 	}
 	const float side = i_rHandle.m_Group == EVolumeCorner ? c_CornerSide : c_CentreSide;
