@@ -1,4 +1,5 @@
 # Sourced by the commands. ensure_packages PURPOSE...: installs the packages of these purposes that are missing.
+# configure PRESET [OPTION...]: for a build of everything, with many files of a target compiled as one.
 # build PRESET [TARGET...]: builds what was configured.
 
 say() { printf '\n== %s\n' "$*"; }
@@ -15,6 +16,12 @@ ensure_packages() {
 	[ "$(id -u)" -eq 0 ] || root=(sudo)
 	"${root[@]}" apt-get update -qq
 	"${root[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null
+}
+
+configure() {
+	local preset=$1
+	shift
+	cmake --preset "$preset" -D CMAKE_UNITY_BUILD=ON "$@"
 }
 
 build() {

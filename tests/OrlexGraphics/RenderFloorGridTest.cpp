@@ -11,8 +11,8 @@ using namespace OrlexGraphics;
 namespace
 {
 
-constexpr int c_Width = 600;
-constexpr int c_Height = 400;
+constexpr int c_FloorWidth = 600;
+constexpr int c_FloorHeight = 400;
 constexpr int c_Background = 100;
 
 using VColour = std::array<int, 3>;
@@ -21,7 +21,7 @@ using VColour = std::array<int, 3>;
 class RenderFloor : public VRenderTypeTest
 {
 protected:
-	RenderFloor() : VRenderTypeTest(QSize(c_Width, c_Height)) {}
+	RenderFloor() : VRenderTypeTest(QSize(c_FloorWidth, c_FloorHeight)) {}
 
 	void SetUp() override
 	{

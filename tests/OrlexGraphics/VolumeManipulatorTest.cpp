@@ -10,8 +10,8 @@ using namespace OrlexGraphics;
 namespace
 {
 
-constexpr int c_Width = 400;
-constexpr int c_Height = 300;
+constexpr int c_VolumeWidth = 400;
+constexpr int c_VolumeHeight = 300;
 
 const VVolume c_Volume{QVector3D(-1000, -2000, -100), QVector3D(1000, 2000, 3000)};
 
@@ -22,7 +22,7 @@ CoreGraphics::VCameraController MakeCamera(std::uint32_t i_Type, bool i_bYUp = f
 	camera.m_Type = i_Type;
 	camera.m_bYUp = i_bYUp;
 	camera.m_OrthographicScale = 20.0f;
-	camera.SetSize(QSize(c_Width, c_Height));
+	camera.SetSize(QSize(c_VolumeWidth, c_VolumeHeight));
 	camera.Update();
 	return camera;
 }
@@ -30,7 +30,7 @@ CoreGraphics::VCameraController MakeCamera(std::uint32_t i_Type, bool i_bYUp = f
 class VolumeManipulator : public VRenderTypeTest
 {
 protected:
-	VolumeManipulator() : VRenderTypeTest(QSize(c_Width, c_Height)) {}
+	VolumeManipulator() : VRenderTypeTest(QSize(c_VolumeWidth, c_VolumeHeight)) {}
 
 	void SetUp() override
 	{

@@ -11,7 +11,7 @@ using CoreOrlexTypes::VSubjectParametrised;
 using RetargetSetup::VShownTarget;
 
 /// A position target and a rotation target of a subject of scale 2.
-VSubjectParametrised Subject()
+VSubjectParametrised TargetSubject()
 {
 	VSubjectParametrised subject;
 	subject.m_DynamicParameters.resize(1);
@@ -28,14 +28,14 @@ VSubjectParametrised Subject()
 
 TEST(ShownTarget, TellsNumbersWhereTheFileHoldsExpressions)
 {
-	const VShownTarget position = RetargetSetup::ShowTarget(Subject(), 0);
+	const VShownTarget position = RetargetSetup::ShowTarget(TargetSubject(), 0);
 	EXPECT_EQ(position.m_Index, 0);
 	EXPECT_EQ(position.m_Weight, 0.5) << "below what could be typed, and shown as it is";
 	EXPECT_EQ(position.m_State, (std::array<std::string, 3>{"24.5", "0", "0.10000000000000001"}));
 	EXPECT_FALSE(position.m_bStateHidden);
-	EXPECT_TRUE(RetargetSetup::ShowTarget(Subject(), 1).m_bStateHidden);
+	EXPECT_TRUE(RetargetSetup::ShowTarget(TargetSubject(), 1).m_bStateHidden);
 	for (const std::int32_t index : {-1, 2})
-		EXPECT_EQ(RetargetSetup::ShowTarget(Subject(), index).m_Index, -1) << index;
+		EXPECT_EQ(RetargetSetup::ShowTarget(TargetSubject(), index).m_Index, -1) << index;
 }
 
 TEST(ShownTarget, OnlyWhatWasEditedIsWritten)
@@ -48,7 +48,7 @@ TEST(ShownTarget, OnlyWhatWasEditedIsWritten)
 		double m_Weight;
 		std::vector<std::string> m_State;
 	};
-	const std::vector<std::string> before = Subject().m_Targets[0].m_StateExpressions;
+	const std::vector<std::string> before = TargetSubject().m_Targets[0].m_StateExpressions;
 	const VCase cases[] = {
 	    {"nothing", [](VShownTarget&) {}, false, 0.5, before},
 	    {"weight", [](VShownTarget& io_rTarget) { io_rTarget.m_Weight = 7.0; }, true, 7.0, before},
@@ -60,7 +60,7 @@ TEST(ShownTarget, OnlyWhatWasEditedIsWritten)
 	for (const VCase& rCase : cases)
 	{
 		SCOPED_TRACE(rCase.m_pName);
-		VSubjectParametrised subject = Subject();
+		VSubjectParametrised subject = TargetSubject();
 		const VShownTarget shown = RetargetSetup::ShowTarget(subject, 0);
 		VShownTarget edited = shown;
 		rCase.m_Edit(edited);
@@ -68,7 +68,7 @@ TEST(ShownTarget, OnlyWhatWasEditedIsWritten)
 		EXPECT_EQ(subject.m_Targets[0].m_Weight, rCase.m_Weight);
 		EXPECT_EQ(subject.m_Targets[0].m_StateExpressions, rCase.m_State);
 	}
-	VSubjectParametrised subject = Subject();
+	VSubjectParametrised subject = TargetSubject();
 	VShownTarget shown = RetargetSetup::ShowTarget(subject, 1);
 	subject.m_Targets.pop_back();
 	VShownTarget edited = shown;

@@ -7,8 +7,6 @@ namespace
 
 using VJson = nlohmann::json;
 
-const std::string c_Performer = Data("qrt/performer.qrs");
-
 /// The file's text with a part of it replaced, which must be there.
 std::string Damaged(const std::string& i_rPath, const std::string& i_rFrom, const std::string& i_rTo)
 {

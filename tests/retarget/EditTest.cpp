@@ -10,9 +10,6 @@ namespace
 
 using VJson = nlohmann::json;
 
-const std::string c_Fbx = Data("fbx/own_ns_yup_cm_b7400.fbx");
-const std::string c_Performer = Data("qrt/performer.qrs");
-
 VJson RunJson(const std::vector<std::string>& i_rArguments, const VScratchFolder& i_rFolder)
 {
 	const VRun run = RunRetarget(i_rArguments, i_rFolder.Path());

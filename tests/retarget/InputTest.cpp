@@ -3,9 +3,6 @@
 namespace
 {
 
-const std::string c_Fbx = Data("fbx/own_ns_yup_cm_b7400.fbx");
-const std::string c_Performer = Data("qrt/performer.qrs");
-
 std::string Replaced(std::string i_Text, const std::string& i_rFrom, const std::string& i_rTo)
 {
 	return i_Text.replace(i_Text.find(i_rFrom), i_rFrom.size(), i_rTo);

@@ -11,8 +11,6 @@ namespace
 
 using VJson = nlohmann::json;
 
-const std::string c_Performer = Data("qrt/performer.qrs");
-
 VJson Result(const std::vector<std::string>& i_rArguments, const VScratchFolder& i_rFolder, int i_Status = 0)
 {
 	const VRun run = RunRetarget(i_rArguments, i_rFolder.Path());

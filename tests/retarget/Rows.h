@@ -44,3 +44,6 @@ inline std::string Data(const std::string& i_rName)
 {
 	return RETARGET_TEST_DATA "/" + i_rName;
 }
+
+inline const std::string c_Fbx = Data("fbx/own_ns_yup_cm_b7400.fbx");
+inline const std::string c_Performer = Data("qrt/performer.qrs");

@@ -7,9 +7,6 @@
 namespace
 {
 
-const std::string c_Fbx = Data("fbx/own_ns_yup_cm_b7400.fbx");
-const std::string c_Performer = Data("qrt/performer.qrs");
-
 std::vector<std::string> Create(std::vector<std::string> i_Edits)
 {
 	std::vector<std::string> arguments{"create", "--fbx", c_Fbx, "--source", c_Performer, "-o", "x.qrr"};

@@ -57,8 +57,8 @@ VShape MakeArrow()
 		float m_Radius;
 		float m_Z;
 	};
-	const VRing rings[] = {
-	    {c_ForceShaftRadius, 0.0f}, {c_ForceShaftRadius, 1.0f - c_HeadPart}, {c_ForceHeadRadius, 1.0f - c_HeadPart}, {0.0f, 1.0f}};
+	const VRing rings[] = {{c_ForceShaftRadius, 0.0f}, {c_ForceShaftRadius, 1.0f - c_HeadPart},
+	    {c_ForceHeadRadius, 1.0f - c_HeadPart}, {0.0f, 1.0f}};
 	std::vector<VVertex> vertices;
 	std::vector<std::uint16_t> indices;
 	for (const VRing& rRing : rings)
@@ -105,8 +105,8 @@ void VRenderForcePlates::AllocateIds()
 		m_pRegistry->Allocate(item, rPlate.m_Name);
 		m_pRegistry->SetItemMatrix(item, rPlate.m_Transform);
 		// About the plate's middle, the arrow included.
-		const float radius = std::max(
-		    0.5f * rPlate.m_Size.length(), rPlate.m_CentreOfPressure.length() + rPlate.m_Force.length() + c_ForceHeadRadius);
+		const float radius = std::max(0.5f * rPlate.m_Size.length(),
+		    rPlate.m_CentreOfPressure.length() + rPlate.m_Force.length() + c_ForceHeadRadius);
 		m_pRegistry->SetItemBound(item, QVector4D(rPlate.m_Transform.column(3).toVector3D(), radius));
 		m_Ids.push_back(m_pRegistry->GetId(item));
 	}

@@ -62,8 +62,9 @@ struct VRenderVolumeManipulator::VDrawing
 	explicit VDrawing(CoreGraphics::VShaderLibrary& io_rLibrary)
 	    : m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, "Simple3DModelColour", "Colour")),
 	      m_pLines(io_rLibrary.GetProgram("Simple3DModelWireframe", "UniformColour")),
-	      m_Cylinder(CoreGraphics::MakeCylinder(c_VolumeSides, true)), m_Cone(CoreGraphics::MakeCone(c_VolumeSides, true)),
-	      m_Box(CoreGraphics::MakeBox(false)), m_WireBox(CoreGraphics::MakeBox(true))
+	      m_Cylinder(CoreGraphics::MakeCylinder(c_VolumeSides, true)),
+	      m_Cone(CoreGraphics::MakeCone(c_VolumeSides, true)), m_Box(CoreGraphics::MakeBox(false)),
+	      m_WireBox(CoreGraphics::MakeBox(true))
 	{
 	}
 
