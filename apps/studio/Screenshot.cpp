@@ -2,9 +2,11 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
+#include "OrlexGraphics/SkinCache.h"
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
 #include "studio/QtDispatcher.h"
+#include "studio/Services.h"
 #include "studio/StudioWindow.h"
 
 #include <QBuffer>
@@ -46,7 +48,7 @@ void VScreenshot::OnDrawn()
 
 bool VScreenshot::AtRest() const
 {
-	return m_rWindow.Dispatcher().PendingCount() == 0;
+	return m_rWindow.Dispatcher().PendingCount() == 0 && m_rWindow.Gui().GetSkinCache()->Loading().empty();
 }
 
 bool VScreenshot::Save() const

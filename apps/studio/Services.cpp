@@ -4,6 +4,7 @@
 #include "OrlexGraphics/SkinCache.h"
 #include "TesselDataStore/DataStore.h"
 #include "TesselParametersGUI/ParameterGroupModel.h"
+#include "studio/JobRunner.h"
 
 namespace StudioHost
 {
@@ -44,7 +45,8 @@ VQmlServices QmlServices(VPluginContext& i_rContext, VCommandRunner i_RunCommand
 VPluginGui::VPluginGui(
     QMainWindow& i_rWindow, VPluginContext& i_rContext, bool i_bDeveloper, VCommandRunner i_RunCommand)
     : m_pShaderLibrary(MakeShaderLibrary(i_bDeveloper)),
-      m_pSkinCache(NVX::MakeShared<OrlexGraphics::VSkinCache>(i_rContext.GetDispatcher())),
+      m_pSkinCache(
+          NVX::MakeShared<OrlexGraphics::VSkinCache>(i_rContext.GetDispatcher(), std::make_shared<VJobRunner>())),
       m_pQuickEngine(std::make_shared<VQuickEngine>(i_bDeveloper, QmlServices(i_rContext, std::move(i_RunCommand)))),
       m_pPanelManager(new VPanelManager(i_rWindow))
 {

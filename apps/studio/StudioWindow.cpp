@@ -11,11 +11,13 @@
 #include "studio/RecentFiles.h"
 #include "studio/RetargetPanel.h"
 #include "studio/Services.h"
+#include "studio/SkinProgress.h"
 
 #include <QCloseEvent>
 #include <QDockWidget>
 #include <QLabel>
 #include <QMenu>
+#include <QMenuBar>
 #include <QMessageBox>
 #include <QMimeData>
 #include <QTimer>
@@ -71,6 +73,7 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	addDockWidget(Qt::BottomDockWidgetArea, m_pLogDock);
 
 	MakeMenus(i_bDeveloper);
+	menuBar()->setCornerWidget(new VSkinProgress(m_pGui->GetSkinCache(), m_pDispatcher));
 	resize(1280, 800);
 }
 

@@ -219,13 +219,15 @@ TEST_P(Shading, MaterialsMixTheirColourWithTheSubjects)
 TEST_P(Shading, XRayShowsEdges)
 {
 	ASSERT_TRUE(Use("FBXSkin", "XRay"));
-	std::vector<QMatrix4x4> bones(250);
 	VUniform transforms("u_BoneTransforms");
-	m_Render.SetUniform(transforms, bones.data(), bones.size());
+	// Without bones in the vertices the fourth influence is all of bone 1.
+	std::vector<float> bones(32);
+	for (const std::size_t one : {0u, 5u, 10u, 15u})
+		bones[one] = bones[16 + one] = 1.0f;
+	m_Render.SetUniform(transforms, bones.data(), 2);
 	Set("u_HighlightMissing", 0);
 	Set("u_DiffuseTextureEnabled", 0);
 	Set("u_DiffuseColour", QVector4D(1.0f, 0.5f, 0.0f, 1.0f));
-	// No weights: the first bone moves it.
 	ExpectColour(QVector3D(0, 0, 1), QVector4D(1, 1, 1, 1.25f * 0.03f));
 	ExpectColour(QVector3D(0, 1, 0), QVector4D(1, 1, 1, 0.25f + 1.25f * 0.03f));
 }

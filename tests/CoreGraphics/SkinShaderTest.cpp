@@ -59,7 +59,10 @@ protected:
 		VUniform bones("u_BoneTransforms"), highlight("u_HighlightMissing");
 		m_Render.ClearBuffers(true, true);
 		EXPECT_TRUE(m_Render.UseProgram(m_Library.GetProgram("FBXSkin", "Colour")));
-		m_Render.SetUniform(bones, m_Bones.data(), m_Bones.size());
+		std::vector<float> columns;
+		for (const QMatrix4x4& rBone : m_Bones)
+			columns.insert(columns.end(), rBone.constData(), rBone.constData() + 16);
+		m_Render.SetUniform(bones, columns.data(), m_Bones.size());
 		m_Render.SetUniform(highlight, i_bHealth ? 1 : 0);
 		m_Render.BindVertices(buffer);
 		m_Render.DrawArrays(GL_TRIANGLE_STRIP, 4);

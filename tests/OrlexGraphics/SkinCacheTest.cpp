@@ -1,5 +1,9 @@
 #include "OrlexGraphics/SkinCache.h"
+
+#include "CoreGraphics/Skin.h"
+#include "DebugServices/GlobalLog.h"
 #include "InMemoryHost/Dispatcher.h"
+#include "TesselPluginInterface/IJobRunner.h"
 
 #include <QTest>
 #include <boost/filesystem/operations.hpp>
@@ -11,7 +15,45 @@ namespace
 {
 
 using boost::filesystem::path;
+using CoreGraphics::VSkin;
+using OrlexGraphics::VSkinCache;
 namespace SkinStatus = OrlexGraphics::SkinStatus;
+
+/// A background whose jobs run when the test says so.
+class VHeldJobs : public TesselPluginInterface::IJobRunner
+{
+public:
+	void Run(std::function<void()> i_Job, std::function<void()> i_Completion,
+	    std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher) override
+	{
+		m_Jobs.push_back(
+		    [=]
+		    {
+			    i_Job();
+			    i_pDispatcher->Post(i_Completion);
+		    });
+	}
+	void RunAll()
+	{
+		for (const auto& rJob : std::exchange(m_Jobs, {}))
+			rJob();
+	}
+	std::vector<std::function<void()>> m_Jobs;
+};
+
+struct VHeldDelay : OrlexGraphics::IDelay
+{
+	void Start(std::chrono::milliseconds i_Time, std::function<void()> i_Callback) override
+	{
+		EXPECT_EQ(i_Time.count(), 1000);
+		m_Callback = std::move(i_Callback);
+		++m_Starts;
+	}
+	void Stop() override { m_Callback = nullptr; }
+
+	std::function<void()> m_Callback;
+	int m_Starts = 0;
+};
 
 class SkinCache : public testing::Test
 {
@@ -20,81 +62,181 @@ protected:
 	{
 		for (const char* const pFolder : {"a", "b"})
 			boost::filesystem::create_directories(m_Root / pFolder);
+		auto pDelay = std::make_unique<VHeldDelay>();
+		m_pDelay = pDelay.get();
+		m_pCache = NVX::MakeShared<VSkinCache>(m_pDispatcher, m_pJobs, std::move(pDelay));
 		m_pCache->ChangedSignal().Connect([this] { ++m_Changes; });
+		m_pCache->LoadingSignal().Connect([this] { ++m_LoadingChanges; });
 	}
 	~SkinCache() override { boost::filesystem::remove_all(m_Root); }
 
-	path Write(const char* i_pFile)
+	path Write(const char* i_pFile, const char* i_pText = "no skin")
 	{
-		std::ofstream((m_Root / i_pFile).string()) << "skin";
+		std::ofstream((m_Root / i_pFile).string()) << i_pText;
 		return m_Root / i_pFile;
+	}
+	void WriteHero(const char* i_pFile)
+	{
+		boost::filesystem::copy_file(RETARGET_SOURCE "/demo/character.fbx", m_Root / i_pFile);
 	}
 
 	std::uint32_t Status(const char* i_pName, const char* i_pGroup = OrlexGraphics::c_pSubjectSkins)
 	{
-		m_Path.clear();
-		return m_pCache->GetPath(m_Path, i_pName, i_pGroup);
+		return m_pCache->GetSkin(m_pSkin, i_pName, i_pGroup);
 	}
+	void SetFolders(const std::vector<path>& i_rFolders)
+	{
+		m_pCache->SetFolders(OrlexGraphics::c_pSubjectSkins, i_rFolders);
+	}
+	std::uint32_t Load(const char* i_pName)
+	{
+		EXPECT_EQ(Status(i_pName), SkinStatus::c_Loading);
+		m_pJobs->RunAll();
+		return Status(i_pName);
+	}
+	/// The burst of changes that the folders tell of, until it has ended.
+	testing::AssertionResult WaitForChange()
+	{
+		const int starts = m_pDelay->m_Starts;
+		const auto changed = [&]
+		{
+			m_pDispatcher->RunPending();
+			return m_pDelay->m_Starts > starts;
+		};
+		if (!QTest::qWaitFor(changed, 20000))
+			return testing::AssertionFailure() << "no change was told";
+		return testing::AssertionSuccess();
+	}
+	std::string TakeLog() { return std::exchange(m_Log, {}); }
 
 	const path m_Root = boost::filesystem::temp_directory_path() / boost::filesystem::unique_path("skins-%%%%%%%%");
 	const std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
-	const std::shared_ptr<OrlexGraphics::VSkinCache> m_pCache =
-	    NVX::MakeShared<OrlexGraphics::VSkinCache>(m_pDispatcher);
-	path m_Path;
+	const std::shared_ptr<VHeldJobs> m_pJobs = std::make_shared<VHeldJobs>();
+	VHeldDelay* m_pDelay = nullptr;
+	std::shared_ptr<VSkinCache> m_pCache;
+	std::shared_ptr<VSkin> m_pSkin;
 	int m_Changes = 0;
+	int m_LoadingChanges = 0;
+	std::string m_Log;
+	const std::shared_ptr<void> m_pSink = NVX::GlobalLog::AddSink(
+	    [this](const NVX::VLogCategory&, int, const std::string& i_rMessage) { m_Log += i_rMessage + "\n"; });
 };
 
-TEST_F(SkinCache, FindsSkinsOfAGroup)
+TEST_F(SkinCache, LoadsSkinsOfAGroupInTheBackground)
 {
-	Write("a/Hero.fbx");
-	const path later = Write("b/Hero.fbx");
-	const path clown = Write("a/K\xc3\xb6nig.fbx");
+	WriteHero("a/Hero.fbx");
+	WriteHero("a/K\xc3\xb6nig.fbx");
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_NotFound) << "no such group";
 
-	m_pCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {m_Root / "a", m_Root / "b", m_Root / "missing"});
+	SetFolders({m_Root / "a", m_Root / "b", m_Root / "missing"});
 	EXPECT_EQ(m_Changes, 1);
+	EXPECT_EQ(Status("Hero"), SkinStatus::c_Loading);
+	EXPECT_EQ(Status("Hero"), SkinStatus::c_Loading);
+	ASSERT_EQ(m_pJobs->m_Jobs.size(), 1u) << "one job, however often one asks";
+	EXPECT_EQ(m_pCache->Loading(), std::vector<std::string>{"Hero"});
+	EXPECT_EQ(m_LoadingChanges, 1);
+	EXPECT_EQ(m_pSkin, nullptr);
+
+	m_pJobs->RunAll();
+	EXPECT_EQ(Status("Hero"), SkinStatus::c_Ready) << "as soon as it is read";
+	ASSERT_NE(m_pSkin, nullptr);
+	EXPECT_EQ(m_pSkin->Name(), "Hero");
+	EXPECT_FALSE(m_pSkin->Meshes().empty());
+	EXPECT_EQ(m_Changes, 1);
+	m_pDispatcher->RunPending();
+	EXPECT_EQ(m_Changes, 2);
+	EXPECT_TRUE(m_pCache->Loading().empty());
+	EXPECT_EQ(m_LoadingChanges, 2);
+
+	const std::shared_ptr<VSkin> pFirst = m_pSkin;
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_Ready);
-	EXPECT_EQ(m_Path, later) << "the later folder";
-	EXPECT_EQ(Status("K\xc3\xb6nig"), SkinStatus::c_Ready);
-	EXPECT_EQ(m_Path, clown);
+	EXPECT_EQ(m_pSkin, pFirst) << "read once, worn by all";
+	EXPECT_EQ(Load("K\xc3\xb6nig"), SkinStatus::c_Ready);
 	EXPECT_EQ(Status("Villain"), SkinStatus::c_NotFound);
 	EXPECT_EQ(Status("Hero", "Other"), SkinStatus::c_NotFound);
 
-	m_pCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {m_Root / "a", m_Root / "b", m_Root / "missing"});
-	EXPECT_EQ(m_Changes, 1) << "the same folders again";
-	m_pCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {m_Root / "a"});
-	EXPECT_EQ(m_Changes, 2);
+	m_pDispatcher->RunPending();
+	m_Changes = 0;
+	SetFolders({m_Root / "a", m_Root / "b", m_Root / "missing"});
+	EXPECT_EQ(m_Changes, 0) << "the same folders again";
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_Ready);
-	EXPECT_NE(m_Path, later);
+	// The later folder counts, whatever is in it.
+	Write("b/Hero.fbx");
+	SetFolders({m_Root / "a", m_Root / "b"});
+	EXPECT_EQ(m_Changes, 1);
+	EXPECT_EQ(Load("Hero"), SkinStatus::c_LoadFailed);
+	SetFolders({m_Root / "b", m_Root / "a"});
+	EXPECT_EQ(Load("Hero"), SkinStatus::c_Ready);
 
+	EXPECT_EQ(Status("K\xc3\xb6nig"), SkinStatus::c_Loading);
 	m_pCache->Dispose();
+	m_Changes = 0;
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_Disposed);
-	m_pCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {m_Root / "b"});
-	EXPECT_EQ(m_Changes, 2);
+	SetFolders({m_Root / "b"});
+	m_pJobs->RunAll();
+	m_pDispatcher->RunPending();
+	EXPECT_EQ(m_Changes, 0);
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_Disposed);
+}
+
+TEST_F(SkinCache, LoadsAtOnceWithoutABackground)
+{
+	WriteHero("a/Hero.fbx");
+	m_pCache = NVX::MakeShared<VSkinCache>(m_pDispatcher);
+	SetFolders({m_Root / "a"});
+	EXPECT_EQ(Status("Hero"), SkinStatus::c_Ready);
+	EXPECT_NE(m_pSkin, nullptr);
+	EXPECT_EQ(m_pCache->Loading().size(), 1u) << "until its end is told";
+	m_pCache.reset();
+	m_pDispatcher->RunPending();
+}
+
+TEST_F(SkinCache, TellsWhyThereIsNoSkin)
+{
+	const path broken = Write("a/Broken.fbx");
+	SetFolders({m_Root / "a", m_Root / "b"});
+	EXPECT_EQ(Load("Broken"), SkinStatus::c_LoadFailed);
+	EXPECT_NE(
+	    TakeLog().find("The skin Broken is not shown: " + broken.string() + " could not be read"), std::string::npos);
+	EXPECT_EQ(Status("Broken"), SkinStatus::c_LoadFailed) << "until the file changes";
+	EXPECT_TRUE(m_pJobs->m_Jobs.empty());
+
+	EXPECT_EQ(Status("Villain"), SkinStatus::c_NotFound);
+	EXPECT_EQ(TakeLog(), "") << "a skin that may be missing";
+	for (int i = 0; i < 2; ++i)
+		m_pCache->WarnOfMissing("Villain", OrlexGraphics::c_pSubjectSkins);
+	EXPECT_EQ(TakeLog(),
+	    "The skin Villain is not shown: no file Villain.fbx in " + (m_Root / "a").string() + ", "
+	        + (m_Root / "b").string() + "\n");
+	SetFolders({});
+	EXPECT_EQ(Status("Villain"), SkinStatus::c_NotFound);
+	m_pCache->WarnOfMissing("Villain", OrlexGraphics::c_pSubjectSkins);
+	EXPECT_EQ(TakeLog(), "The skin Villain is not shown: there are no folders of skins\n");
 }
 
 TEST_F(SkinCache, FollowsTheFolders)
 {
-	m_pCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {m_Root / "a"});
+	SetFolders({m_Root / "a"});
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_NotFound);
 	m_Changes = 0;
-	const path hero = Write("a/Hero.fbx");
+	WriteHero("a/Hero.fbx");
 	Write("a/notes.txt");
-	const auto changed = [&]
-	{
-		m_pDispatcher->RunPending();
-		return m_Changes > 0;
-	};
-	ASSERT_TRUE(QTest::qWaitFor(changed, 20000));
-	EXPECT_EQ(m_Changes, 1) << "a burst of changes is one";
-	EXPECT_EQ(Status("Hero"), SkinStatus::c_Ready);
-	EXPECT_EQ(m_Path, hero);
+	ASSERT_TRUE(WaitForChange());
+	EXPECT_EQ(m_Changes, 0) << "the burst may go on";
+	m_pDelay->m_Callback();
+	EXPECT_EQ(m_Changes, 1);
+	EXPECT_EQ(Load("Hero"), SkinStatus::c_Ready);
+	const std::shared_ptr<VSkin> pWorn = m_pSkin;
 
-	m_Changes = 0;
-	boost::filesystem::remove(hero);
-	ASSERT_TRUE(QTest::qWaitFor(changed, 20000));
+	// What changes while it is being read is read again.
+	Write("a/Hero.fbx");
+	ASSERT_TRUE(WaitForChange());
+	EXPECT_EQ(Status("Hero"), SkinStatus::c_Loading);
+	boost::filesystem::remove(m_Root / "a/Hero.fbx");
+	ASSERT_TRUE(WaitForChange());
+	m_pJobs->RunAll();
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_NotFound);
+	EXPECT_EQ(m_pSkin, pWorn) << "whoever wears it keeps it";
 }
 
 } // namespace

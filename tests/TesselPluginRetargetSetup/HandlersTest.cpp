@@ -294,10 +294,9 @@ TEST_F(Handlers, SkinsAreLookedForInTheUsersFolder)
 	Copy(c_DemoFBX, "skins/dragon.fbx");
 	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "skins");
 	Open();
-	fs::path found;
-	const auto status = [&](const char* i_pName) { return m_pGui->m_pSkinCache->GetPath(found, i_pName, "Subject"); };
+	std::shared_ptr<CoreGraphics::VSkin> pSkin;
+	const auto status = [&](const char* i_pName) { return m_pGui->m_pSkinCache->GetSkin(pSkin, i_pName, "Subject"); };
 	EXPECT_EQ(status("dragon"), OrlexGraphics::SkinStatus::c_Ready);
-	EXPECT_EQ(found, m_Folder / "skins/dragon.fbx");
 	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "none");
 	Run();
 	EXPECT_EQ(status("dragon"), OrlexGraphics::SkinStatus::c_NotFound);

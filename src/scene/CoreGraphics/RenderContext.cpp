@@ -147,10 +147,10 @@ void VRenderContext::SetUniform(VUniform& io_rUniform, const QMatrix4x4& i_rValu
 		m_pFunctions->glUniformMatrix4fv(location, 1, GL_FALSE, i_rValue.constData());
 }
 
-void VRenderContext::SetUniform(VUniform& io_rUniform, const QMatrix4x4* i_pValues, std::size_t i_Count)
+void VRenderContext::SetUniform(VUniform& io_rUniform, const float* i_pMatrices, std::size_t i_Count)
 {
 	if (const int location = io_rUniform.LocationIn(*m_pProgram); location != -1)
-		m_pProgram->Get()->setUniformValueArray(location, i_pValues, static_cast<int>(i_Count));
+		m_pFunctions->glUniformMatrix4fv(location, static_cast<GLsizei>(i_Count), GL_FALSE, i_pMatrices);
 }
 
 void VRenderContext::SetVertexFormat(const VVertexFormat& i_rFormat)

@@ -117,7 +117,8 @@ public:
 	void SetUniform(VUniform& io_rUniform, const QVector3D& i_rValue);
 	void SetUniform(VUniform& io_rUniform, const QVector4D& i_rValue);
 	void SetUniform(VUniform& io_rUniform, const QMatrix4x4& i_rValue);
-	void SetUniform(VUniform& io_rUniform, const QMatrix4x4* i_pValues, std::size_t i_Count);
+	/// Matrices of 16 numbers each, column by column.
+	void SetUniform(VUniform& io_rUniform, const float* i_pMatrices, std::size_t i_Count);
 
 	/// Of the vertex buffer that is bound, for the program in use.
 	void SetVertexFormat(const VVertexFormat& i_rFormat);

@@ -1,9 +1,11 @@
 #include "Flow2Graphics/FlowRenderSubject.h"
 
 #include "ComputeSubjectFK/TargetFKInterfaces.h"
+#include "CoreGraphics/Skin.h"
 #include "DebugServices/GlobalLog.h"
 #include "Flow2Graphics/SubjectShapes.h"
 #include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/SkinCache.h"
 #include "numerics/AllFinite.h"
 
 #include <algorithm>
@@ -104,6 +106,43 @@ void VFlowRenderSubject::Update(
 	FillMarkers(i_rPoseData.m_pLabels, io_rRegistry, i_rSceneTransform);
 	FillTargets(io_rRegistry, i_rSceneTransform);
 	FillSegments(io_rRegistry);
+	UpdateSkins();
+}
+
+bool VFlowRenderSubject::BindSkins(OrlexGraphics::VSkinCache& io_rCache)
+{
+	if (m_pData->m_Skin.empty())
+		return true;
+	std::shared_ptr<CoreGraphics::VSkin> pSkin;
+	const std::uint32_t status = io_rCache.GetSkin(pSkin, m_pData->m_Skin, OrlexGraphics::c_pSubjectSkins);
+	if (status == OrlexGraphics::SkinStatus::c_Loading)
+		return false;
+	if (status == OrlexGraphics::SkinStatus::c_NotFound)
+		io_rCache.WarnOfMissing(m_pData->m_Skin, OrlexGraphics::c_pSubjectSkins);
+	m_pRenderData->m_pSkin.reset();
+	if (!pSkin)
+		return true;
+	std::vector<std::string> names;
+	std::vector<QVector3D> offsets;
+	for (const VSubject::VSegment& rSegment : m_pSubject->m_Segments)
+	{
+		names.push_back(rSegment.m_Name);
+		offsets.push_back(ToVector(rSegment.m_PreTranslation));
+	}
+	m_pRenderData->m_pSkin = std::make_unique<CoreGraphics::VSkinInstance>();
+	m_pRenderData->m_pSkin->Bind(std::move(pSkin), names, offsets);
+	m_pRenderData->m_pSkin->SetUserColours(ToColour(m_pData->m_SkinColourA), ToColour(m_pData->m_SkinColourB));
+	return true;
+}
+
+void VFlowRenderSubject::UpdateSkins()
+{
+	m_pRenderData->m_bSkin = m_pRenderData->m_pSkin || !m_pRenderData->m_ClusterSkins.empty();
+	if (!m_pRenderData->m_pSkin)
+		return;
+	for (std::size_t i = 0; i < m_SegmentHealth.size(); ++i)
+		m_pRenderData->m_pSkin->SetHealth(i, m_SegmentHealth[i]);
+	m_pRenderData->m_pSkin->UpdatePose(m_SegmentMatrices);
 }
 
 void VFlowRenderSubject::TakeMatrices(const QMatrix4x4& i_rSceneTransform)

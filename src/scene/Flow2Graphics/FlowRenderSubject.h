@@ -20,7 +20,8 @@
 namespace OrlexGraphics
 {
 class VSelectionRegistry;
-}
+class VSkinCache;
+} // namespace OrlexGraphics
 
 namespace Flow2Graphics
 {
@@ -45,6 +46,10 @@ public:
 	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pData,
 	    std::shared_ptr<const ISubjectSelectionMaker> i_pSelectionMaker);
 	~VFlowRenderSubject();
+
+	/// Puts on the skins that the cache has now, and takes off those that it has no more.
+	/// @return false if one of them is still being loaded: then ask again, until then the subject wears what it wore
+	bool BindSkins(OrlexGraphics::VSkinCache& io_rCache);
 
 	void Update(const VPoseData& i_rPoseData, OrlexGraphics::VSelectionRegistry& io_rRegistry,
 	    const QMatrix4x4& i_rSceneTransform);
@@ -75,6 +80,8 @@ private:
 	void CheckHealth(const CoreOrlexTypes::VSubject::VTarget& i_rTarget);
 	void FillSegments(OrlexGraphics::VSelectionRegistry& io_rRegistry);
 	void FillBone(std::size_t i_Index);
+	/// The pose and the health of the segments, for the skins.
+	void UpdateSkins();
 
 	const std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubject;
 	const std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> m_pData;

@@ -1,6 +1,7 @@
 #include "Flow2Graphics/FlowRenderSubjectList.h"
 
 #include "Flow2TypesUtils/ItemCatalogue.h"
+#include "OrlexGraphics/SkinCache.h"
 
 using TesselPluginInterface::IFlowFrame;
 
@@ -53,6 +54,10 @@ void VFlowRenderSubjectList::Update(const IFlowFrame& i_rFrame, VFlowContext& io
 		MakeSubjects(i_rFrame);
 		m_bRebind = true;
 	}
+	if (io_rContext.m_pSkinCache && m_bRebind.exchange(false))
+		for (const std::unique_ptr<VFlowRenderSubject>& rpSubject : m_Subjects)
+			if (!rpSubject->BindSkins(*io_rContext.m_pSkinCache))
+				m_bRebind = true;
 	const auto pPose = FromFrame<CoreOrlexTypes::VSubjectDynamicParameters>(i_rFrame, m_rTypes.m_Pose);
 	const auto pLabels = FromFrame<CoreOrlexTypes::VReconstructionLabelSet>(i_rFrame, m_rTypes.m_Labels);
 	for (const std::unique_ptr<VFlowRenderSubject>& rpSubject : m_Subjects)

@@ -1,5 +1,6 @@
 #include "Flow2Graphics/FlowScene.h"
 
+#include "FBXIO/FBXReader.h"
 #include "Flow2Graphics/FlowRenderCameras.h"
 #include "Flow2Graphics/FlowRenderFloorGrid.h"
 #include "Flow2Graphics/FlowRenderForcePlates.h"
@@ -8,6 +9,7 @@
 #include "Flow2Graphics/FlowRenderReconstructions.h"
 #include "Flow2Graphics/FlowRenderSubjects.h"
 #include "OrlexGraphics/RenderAxis.h"
+#include "OrlexGraphics/RenderFBXScene.h"
 #include "OrlexGraphics/RenderFloorGrid.h"
 #include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/RenderOutlines.h"
@@ -20,6 +22,11 @@
 
 namespace Flow2Graphics
 {
+
+struct VFlowScene::VFBXMeshes
+{
+	std::vector<OrlexGraphics::VRenderFBXScene::VMesh> m_Meshes;
+};
 
 VFlowScene::VFlowScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pShaderLibrary,
     std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager,
@@ -70,6 +77,8 @@ void VFlowScene::InitialiseGL()
 	AddFlowType<VFlowRenderFloorGrid>(std::make_shared<OrlexGraphics::VRenderFloorGrid>(*m_pShaderLibrary));
 	AddFlowType<VFlowRenderForcePlates>(
 	    std::make_shared<OrlexGraphics::VRenderForcePlates>(*m_pShaderLibrary, m_pRegistry));
+	m_pFBXScene = std::make_shared<OrlexGraphics::VRenderFBXScene>(*m_pShaderLibrary);
+	m_RenderList.push_back(m_pFBXScene);
 	AddFlowType<VFlowRenderReconstructions>(std::make_shared<OrlexGraphics::VRenderReconstructions>(*m_pShaderLibrary));
 	AddSubjects();
 	m_pCameraType = std::make_shared<OrlexGraphics::VRenderCameras>();
@@ -120,7 +129,18 @@ bool VFlowScene::Synchronise()
 	if (m_pPendingFrame)
 		m_pFrame = std::move(m_pPendingFrame);
 	m_pPendingFrame.reset();
+	if (m_pPendingMeshes && m_pFBXScene)
+		m_pFBXScene->Set(std::move(std::exchange(m_pPendingMeshes, nullptr)->m_Meshes));
 	return VOrlexScene::Synchronise();
+}
+
+void VFlowScene::LoadFBXScene(const QString& i_rPath)
+{
+	m_pPendingMeshes = std::make_unique<VFBXMeshes>();
+	FBXIO::FBXReader reader;
+	if (!i_rPath.isEmpty() && reader.LoadFile(i_rPath.toStdString()))
+		m_pPendingMeshes->m_Meshes = OrlexGraphics::VRenderFBXScene::ReadMeshes(reader);
+	RequestRefresh();
 }
 
 void VFlowScene::Refresh()

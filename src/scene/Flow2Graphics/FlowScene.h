@@ -9,6 +9,7 @@
 namespace OrlexGraphics
 {
 class VRenderManipulator;
+class VRenderFBXScene;
 class VRenderVolumeManipulator;
 } // namespace OrlexGraphics
 
@@ -51,6 +52,9 @@ public:
 	bool Synchronise() override;
 	/// The frame update.
 	void Refresh() override;
+	/// Shows the meshes of a file beside the subjects, instead of those before; none of a file that cannot be read, and
+	/// for an empty path.
+	void LoadFBXScene(const QString& i_rPath) override;
 
 	std::vector<QVector4D> GetBounds(const std::vector<NVX::ISelectionItem>& i_rSelection) const override;
 	bool GetItemTransform(
@@ -70,10 +74,14 @@ private:
 	/// In the order in which they were made.
 	std::vector<std::shared_ptr<IFlowRenderType>> m_FlowTypes;
 	std::shared_ptr<VFlowRenderSubjectDynamics> m_pDynamics;
+	std::shared_ptr<OrlexGraphics::VRenderFBXScene> m_pFBXScene;
 	Flow2TypesUtils::VItemCacheTyped<Flow2TypesUtils::FlowUpAxisItem> m_UpAxis;
 	NVX::VConnection m_SkinConnection;
 	/// Of the user interface thread.
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pPendingFrame;
+	struct VFBXMeshes;
+	/// Of the user interface thread; null when there are no new ones.
+	std::unique_ptr<VFBXMeshes> m_pPendingMeshes;
 	/// Of the render thread.
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame;
 };

@@ -1,11 +1,13 @@
 #pragma once
 
 #include "CoreGraphics/SelectionId.h"
+#include "CoreGraphics/SkinInstance.h"
 
 #include <QMatrix4x4>
 #include <QVector4D>
 
 #include <cstddef>
+#include <memory>
 #include <vector>
 
 namespace Flow2Graphics
@@ -37,6 +39,9 @@ struct VRenderSubjectData
 		CoreGraphics::VSelectionId m_Id;
 	};
 
+	/// Null without a skin.
+	std::unique_ptr<CoreGraphics::VSkinInstance> m_pSkin;
+	std::vector<CoreGraphics::VSkinInstance> m_ClusterSkins;
 	std::vector<VShape> m_PositionTargets;
 	std::vector<VRotationTarget> m_RotationTargets;
 	std::vector<QMatrix4x4> m_Covariances;
@@ -50,7 +55,7 @@ struct VRenderSubjectData
 	/// A skin is to be drawn.
 	bool m_bSkin = false;
 
-	/// Keeps what the arrays have room for.
+	/// Keeps the skins, and what the arrays have room for.
 	void Clear();
 };
 

@@ -94,7 +94,7 @@ VRenderSubjectDynamics::VStep::VStep(CoreGraphics::VShaderLibrary& io_rLibrary, 
 VRenderSubjectDynamics::VRenderSubjectDynamics(CoreGraphics::VShaderLibrary& io_rLibrary,
     std::shared_ptr<const OrlexGraphics::VSelectionRegistry> i_pRegistry,
     std::shared_ptr<OrlexGraphics::VSphereHelper> i_pSphereHelper)
-    : m_pRegistry(std::move(i_pRegistry)), m_pSphereHelper(std::move(i_pSphereHelper)),
+    : m_pRegistry(std::move(i_pRegistry)), m_pSphereHelper(std::move(i_pSphereHelper)), m_SkinRenderer(io_rLibrary),
       m_SolidBox(CoreGraphics::MakeBox(false)), m_WireBox(CoreGraphics::MakeBox(true)),
       m_Cylinder(CoreGraphics::MakeCylinder(16, true)), m_Cone(CoreGraphics::MakeCone(16, true)),
       m_Sphere(CoreGraphics::MakeSphere(2)), m_AxesLines(CoreGraphics::MakeAxes(c_AxesLength)),
@@ -148,6 +148,7 @@ void VRenderSubjectDynamics::RenderList(const VWalk& i_rWalk)
 		RenderRotationTargets(i_rWalk);
 	if (i_rWalk.m_rOptions.m_bJoints && !bTransparent)
 		RenderSpheres(i_rWalk, &VRenderSubjectData::m_Joints, 3);
+	RenderSkins(i_rWalk);
 	if (i_rWalk.m_rOptions.m_bMissingMarkers && bDecoration)
 		RenderMissingMarkers(i_rWalk);
 	if (i_rWalk.m_rOptions.m_bAxes && bDecoration)
@@ -265,6 +266,27 @@ void VRenderSubjectDynamics::RenderRotationTargets(const VWalk& i_rWalk)
 					        (part == 0 ? rTarget.m_Target : rTarget.m_Segment) * m_ArrowParts[axis][part],
 					        c_AxisColours[axis], rTarget.m_Id))
 						i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, rShape.m_Indices);
+	}
+}
+
+void VRenderSubjectDynamics::RenderSkins(const VWalk& i_rWalk)
+{
+	CoreGraphics::VRenderContext& rContext = i_rWalk.m_rContext;
+	if (!m_SkinRenderer.BeginRender(rContext, i_rWalk.m_rOptions, i_rWalk.m_Pass))
+		return;
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+	{
+		if (!rpSubject->m_bSkin || (i_rWalk.m_bPick && m_pRegistry->IsHidden(rpSubject->m_Id, rContext.m_Mode)))
+			continue;
+		if (i_rWalk.m_rOptions.m_bClusters)
+			for (const CoreGraphics::VSkinInstance& rCluster : rpSubject->m_ClusterSkins)
+				m_SkinRenderer.Draw(rCluster, rContext, i_rWalk.m_rOptions, rpSubject->m_Id);
+		if (!rpSubject->m_pSkin)
+			continue;
+		m_SkinRenderer.Draw(*rpSubject->m_pSkin, rContext, i_rWalk.m_rOptions, rpSubject->m_Id);
+		if (const auto bones = rpSubject->m_pSkin->BoneMatrices(); i_rWalk.m_bPick && !bones.empty())
+			m_pSphereHelper->AddPickPoint(
+			    rContext, QVector3D(bones.front()[12], bones.front()[13], bones.front()[14]), rpSubject->m_Id);
 	}
 }
 

@@ -8,6 +8,7 @@
 #include "Flow2Graphics/SubjectTypes.h"
 #include "OrlexGraphics/IRenderType.h"
 #include "OrlexGraphics/SceneOptions.h"
+#include "OrlexGraphics/SkinRenderer.h"
 
 #include <array>
 #include <memory>
@@ -88,6 +89,7 @@ private:
 	void RenderRotationTargets(const VWalk& i_rWalk);
 	void RenderSpheres(const VWalk& i_rWalk, std::vector<VRenderSubjectData::VShape> VRenderSubjectData::*i_pSpheres,
 	    std::uint32_t i_LevelCap);
+	void RenderSkins(const VWalk& i_rWalk);
 	void RenderMissingMarkers(const VWalk& i_rWalk);
 	void RenderAxes(const VWalk& i_rWalk);
 
@@ -100,6 +102,7 @@ private:
 
 	const std::shared_ptr<const OrlexGraphics::VSelectionRegistry> m_pRegistry;
 	const std::shared_ptr<OrlexGraphics::VSphereHelper> m_pSphereHelper;
+	OrlexGraphics::VSkinRenderer m_SkinRenderer;
 	std::array<VSubjects, ESubjectClassCount> m_Lists;
 
 	CoreGraphics::VShape m_SolidBox;

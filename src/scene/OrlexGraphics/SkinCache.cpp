@@ -2,8 +2,11 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "FileSystemWatcher/FileSystemWatcher.h"
+#include "OrlexGraphics/SkinLoadJob.h"
+#include "TesselPluginInterface/IJobRunner.h"
 #include "UtilsFileSystem/Paths.h"
 
+#include <QTimer>
 #include <boost/filesystem/operations.hpp>
 
 #include <set>
@@ -17,19 +20,41 @@ namespace
 constexpr const char* c_pExtension = ".fbx";
 
 /// Copying a file changes it many times.
-constexpr int c_ChangeDelay = 1000;
+constexpr std::chrono::milliseconds c_ChangeDelay{1000};
+
+class VQtDelay : public IDelay
+{
+public:
+	VQtDelay()
+	{
+		m_Timer.setSingleShot(true);
+		QObject::connect(&m_Timer, &QTimer::timeout, &m_Timer, [this] { m_Callback(); });
+	}
+	void Start(std::chrono::milliseconds i_Time, std::function<void()> i_Callback) override
+	{
+		m_Callback = std::move(i_Callback);
+		m_Timer.start(i_Time);
+	}
+	void Stop() override { m_Timer.stop(); }
+
+private:
+	QTimer m_Timer;
+	std::function<void()> m_Callback;
+};
 
 } // namespace
 
-VSkinCache::VSkinCache(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher)
-    : m_pDispatcher(std::move(i_pDispatcher))
+VSkinCache::VSkinCache(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
+    std::shared_ptr<TesselPluginInterface::IJobRunner> i_pJobRunner, std::unique_ptr<IDelay> i_pDelay)
+    : m_pDispatcher(std::move(i_pDispatcher)), m_pJobRunner(std::move(i_pJobRunner)),
+      m_pDelay(i_pDelay ? std::move(i_pDelay) : std::make_unique<VQtDelay>())
 {
-	m_ChangeTimer.setSingleShot(true);
-	m_ChangeTimer.setInterval(c_ChangeDelay);
-	QObject::connect(&m_ChangeTimer, &QTimer::timeout, &m_ChangeTimer, [this] { m_ChangedSignal.Fire(); });
 }
 
-VSkinCache::~VSkinCache() = default;
+VSkinCache::~VSkinCache()
+{
+	m_pDelay->Stop();
+}
 
 void VSkinCache::SetFolders(const std::string& i_rGroup, const std::vector<boost::filesystem::path>& i_rFolders)
 {
@@ -38,7 +63,8 @@ void VSkinCache::SetFolders(const std::string& i_rGroup, const std::vector<boost
 		const std::lock_guard lock(m_Mutex);
 		if (m_bDisposed)
 			return;
-		VSkinGroup& rGroup = m_Groups[i_rGroup];
+		const auto [group, bNew] = m_Groups.try_emplace(i_rGroup);
+		VSkinGroup& rGroup = group->second;
 		if (rGroup.m_Folders == i_rFolders)
 			return;
 		rGroup.m_Entries.clear();
@@ -77,31 +103,120 @@ bool VSkinCache::HasFolders(const std::string& i_rGroup)
 	return m_Groups.contains(i_rGroup);
 }
 
-std::uint32_t VSkinCache::GetPath(
-    boost::filesystem::path& o_rPath, const std::string& i_rName, const std::string& i_rGroup)
+std::shared_ptr<VSkinLoadJob> VSkinCache::Find(
+    VSkinEntry& io_rEntry, const std::string& i_rName, const std::vector<boost::filesystem::path>& i_rFolders)
 {
-	const std::lock_guard lock(m_Mutex);
+	io_rEntry.m_Status = SkinStatus::c_NotFound;
+	for (const boost::filesystem::path& rFolder : i_rFolders)
+	{
+		const boost::filesystem::path path = rFolder / UtilsFileSystem::PathFromUtf8(i_rName + c_pExtension);
+		boost::system::error_code error;
+		if (boost::filesystem::exists(path, error))
+			io_rEntry.m_Path = path;
+	}
+	if (io_rEntry.m_Path.empty())
+		return {};
+	io_rEntry.m_Status = SkinStatus::c_Loading;
+	io_rEntry.m_pJob = std::make_shared<VSkinLoadJob>(io_rEntry.m_Path, i_rName);
+	m_Jobs.push_back(io_rEntry.m_pJob);
+	return io_rEntry.m_pJob;
+}
+
+std::uint32_t VSkinCache::GetSkin(
+    std::shared_ptr<CoreGraphics::VSkin>& o_rpSkin, const std::string& i_rName, const std::string& i_rGroup)
+{
+	std::unique_lock lock(m_Mutex);
 	if (m_bDisposed)
 		return SkinStatus::c_Disposed;
 	const auto group = m_Groups.find(i_rGroup);
 	if (group == m_Groups.end())
 		return SkinStatus::c_NotFound;
-	VSkinEntry& rEntry = group->second.m_Entries[i_rName];
-	if (rEntry.m_Status == SkinStatus::c_NotLookedFor)
-	{
-		rEntry.m_Status = SkinStatus::c_NotFound;
-		for (const boost::filesystem::path& rFolder : group->second.m_Folders)
+	VSkinEntry* pEntry = &group->second.m_Entries[i_rName];
+	if (pEntry->m_Status == SkinStatus::c_NotLookedFor)
+		if (const auto pJob = Find(*pEntry, i_rName, group->second.m_Folders))
 		{
-			const boost::filesystem::path path = rFolder / UtilsFileSystem::PathFromUtf8(i_rName + c_pExtension);
-			boost::system::error_code error;
-			if (!boost::filesystem::exists(path, error))
-				continue;
-			rEntry.m_Path = path;
-			rEntry.m_Status = SkinStatus::c_Ready;
+			// Nobody waits for the file, nor for what hears of it.
+			lock.unlock();
+			Run(pJob);
+			lock.lock();
+			// Meanwhile all may have been forgotten.
+			if (m_bDisposed)
+				return SkinStatus::c_Disposed;
+			pEntry = &m_Groups[i_rGroup].m_Entries[i_rName];
 		}
+	if (pEntry->m_pJob)
+	{
+		const std::uint32_t status = pEntry->m_pJob->Result(pEntry->m_pSkin);
+		if (status == SkinStatus::c_NotLookedFor)
+			return SkinStatus::c_Loading;
+		pEntry->m_Status = status;
+		pEntry->m_pJob.reset();
 	}
-	o_rPath = rEntry.m_Path;
-	return rEntry.m_Status;
+	if (pEntry->m_Status == SkinStatus::c_Ready)
+		o_rpSkin = pEntry->m_pSkin;
+	return pEntry->m_Status;
+}
+
+void VSkinCache::Run(const std::shared_ptr<VSkinLoadJob>& i_rpJob)
+{
+	m_LoadingSignal.Fire();
+	std::function<void()> completion = [call = WeakBind(&VSkinCache::OnLoaded), i_rpJob]
+	{
+		try
+		{
+			call(i_rpJob);
+		}
+		catch (const NVX::VDeregisterWeakCallbackException&)
+		{
+			// Nobody waits for the skin any more.
+		}
+	};
+	if (m_pJobRunner)
+		return m_pJobRunner->Run([i_rpJob] { i_rpJob->Run(); }, std::move(completion), m_pDispatcher);
+	i_rpJob->Run();
+	m_pDispatcher->Post(std::move(completion));
+}
+
+void VSkinCache::OnLoaded(const std::shared_ptr<VSkinLoadJob>& i_rpJob)
+{
+	{
+		const std::lock_guard lock(m_Mutex);
+		std::erase(m_Jobs, i_rpJob);
+		if (m_bDisposed)
+			return;
+	}
+	m_LoadingSignal.Fire();
+	m_ChangedSignal.Fire();
+}
+
+void VSkinCache::WarnOfMissing(const std::string& i_rName, const std::string& i_rGroup)
+{
+	std::string folders;
+	{
+		const std::lock_guard lock(m_Mutex);
+		const auto group = m_Groups.find(i_rGroup);
+		if (m_bDisposed || group == m_Groups.end())
+			return;
+		const auto entry = group->second.m_Entries.find(i_rName);
+		if (entry == group->second.m_Entries.end() || std::exchange(entry->second.m_bWarned, true))
+			return;
+		for (const boost::filesystem::path& rFolder : group->second.m_Folders)
+			folders += (folders.empty() ? "" : ", ") + UtilsFileSystem::ToUtf8(rFolder);
+	}
+	if (folders.empty())
+		NVX_LOG("VSkinCache", NVX::ELogWarning, "The skin %1% is not shown: there are no folders of skins", i_rName);
+	else
+		NVX_LOG("VSkinCache", NVX::ELogWarning, "The skin %1% is not shown: no file %1%%2% in %3%", i_rName,
+		    c_pExtension, folders);
+}
+
+std::vector<std::string> VSkinCache::Loading()
+{
+	const std::lock_guard lock(m_Mutex);
+	std::vector<std::string> names;
+	for (const std::shared_ptr<VSkinLoadJob>& rpJob : m_Jobs)
+		names.push_back(rpJob->Name());
+	return names;
 }
 
 void VSkinCache::OnChange(const std::string& i_rGroup, const boost::filesystem::path& i_rPath)
@@ -114,18 +229,19 @@ void VSkinCache::OnChange(const std::string& i_rGroup, const boost::filesystem::
 		if (const auto group = m_Groups.find(i_rGroup); group != m_Groups.end())
 			group->second.m_Entries.erase(UtilsFileSystem::ToUtf8(i_rPath.stem()));
 	}
-	m_ChangeTimer.start();
+	m_pDelay->Start(c_ChangeDelay, [this] { m_ChangedSignal.Fire(); });
 }
 
 void VSkinCache::Dispose()
 {
-	m_ChangeTimer.stop();
+	m_pDelay->Stop();
 	// The watchers end outside of the lock: they wait for their threads.
 	std::unordered_map<std::string, VSkinGroup> groups;
 	{
 		const std::lock_guard lock(m_Mutex);
 		m_bDisposed = true;
 		groups.swap(m_Groups);
+		m_Jobs.clear();
 	}
 }
 

@@ -3,8 +3,8 @@
 #include "NVX/Shared.h"
 #include "NVX/Signal.h"
 #include "NVX/Status.h"
+#include "OrlexGraphics/IDelay.h"
 
-#include <QTimer>
 #include <boost/filesystem/path.hpp>
 
 #include <cstdint>
@@ -14,13 +14,25 @@
 #include <unordered_map>
 #include <vector>
 
+namespace CoreGraphics
+{
+class VSkin;
+}
+
 namespace FileSystemWatcher
 {
 class VFileSystemWatcher;
 }
 
+namespace TesselPluginInterface
+{
+class IJobRunner;
+}
+
 namespace OrlexGraphics
 {
+
+class VSkinLoadJob;
 
 /// How far the cache is with a skin; the top bit marks those that give none.
 namespace SkinStatus
@@ -38,13 +50,17 @@ inline constexpr std::uint32_t c_NotFound = NVX::Status::c_NothingToActOn;
 /// The group whose folders hold the skins of subjects.
 inline constexpr const char* c_pSubjectSkins = "Subject";
 
-/// Knows where the skins of each group lie, and watches their folders: a skin is an FBX file, by its name without the
-/// extension. Made with NVX::MakeShared on the user interface thread, where all functions but GetPath run.
+/// Finds and loads the skins of each group, and watches their folders: a skin is an FBX file, by its name without the
+/// extension. Made with NVX::MakeShared on the user interface thread, where all functions run but those that say
+/// otherwise.
 class VSkinCache : public NVX::VShared
 {
 public:
-	/// @param i_pDispatcher brings changes of files to the user interface thread
-	explicit VSkinCache(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher);
+	/// @param i_pDispatcher brings changes of files and ends of jobs to the user interface thread
+	/// @param i_pJobRunner loads skins; without one they are loaded at once, by whoever asks
+	/// @param i_pDelay lets a burst of changes end; null for one of Qt's event loop
+	explicit VSkinCache(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
+	    std::shared_ptr<TesselPluginInterface::IJobRunner> i_pJobRunner = {}, std::unique_ptr<IDelay> i_pDelay = {});
 	~VSkinCache() override;
 
 	/// Replaces the folders of a group, and forgets what was found in those before. The same list again changes
@@ -54,12 +70,26 @@ public:
 	/// Whether folders were set for a group, none included.
 	bool HasFolders(const std::string& i_rGroup);
 
-	/// The file of a skin; of two folders that have it the later one counts.
-	/// @return SkinStatus: ready, not found, or disposed.
-	std::uint32_t GetPath(boost::filesystem::path& o_rPath, const std::string& i_rName, const std::string& i_rGroup);
+	/// A skin that is not there yet begins to be loaded; then ask again when ChangedSignal has fired, or before. Of
+	/// folders that have the file the last one counts. Any thread, but not of two threads at once.
+	/// @param o_rpSkin stays as it is unless the skin is ready
+	/// @return SkinStatus
+	std::uint32_t GetSkin(
+	    std::shared_ptr<CoreGraphics::VSkin>& o_rpSkin, const std::string& i_rName, const std::string& i_rGroup);
 
-	/// Fires after other folders were set, and a second after the last of a burst of changes in a folder.
+	/// Warns in the log that a skin was not found, with the folders that were looked in; once, until it is looked for
+	/// anew. Any thread.
+	void WarnOfMissing(const std::string& i_rName, const std::string& i_rGroup);
+
+	/// The names of the skins that are being loaded. Any thread.
+	std::vector<std::string> Loading();
+
+	/// Fires after other folders were set, after each load, and a second after the last of a burst of changes in a
+	/// folder.
 	NVX::VSignal<>& ChangedSignal() { return m_ChangedSignal; }
+	/// Fires on the thread that asks when a load begins, and then on the user interface thread when it has ended.
+	/// Connect with the dispatcher.
+	NVX::VSignal<>& LoadingSignal() { return m_LoadingSignal; }
 
 	/// No folder is watched any more, and nothing is found.
 	void Dispose();
@@ -68,7 +98,11 @@ private:
 	struct VSkinEntry
 	{
 		boost::filesystem::path m_Path;
+		/// Null when none runs.
+		std::shared_ptr<VSkinLoadJob> m_pJob;
 		std::uint32_t m_Status = SkinStatus::c_NotLookedFor;
+		std::shared_ptr<CoreGraphics::VSkin> m_pSkin;
+		bool m_bWarned = false;
 	};
 
 	struct VSkinGroup
@@ -80,14 +114,24 @@ private:
 	};
 
 	std::shared_ptr<FileSystemWatcher::VFileSystemWatcher> MakeWatcher(const std::string& i_rGroup);
+	/// Looks for the file of a new entry, and makes the job for it. Under the lock.
+	/// @return the job that is to be run; null if there is none
+	std::shared_ptr<VSkinLoadJob> Find(
+	    VSkinEntry& io_rEntry, const std::string& i_rName, const std::vector<boost::filesystem::path>& i_rFolders);
+	void Run(const std::shared_ptr<VSkinLoadJob>& i_rpJob);
+	void OnLoaded(const std::shared_ptr<VSkinLoadJob>& i_rpJob);
 	void OnChange(const std::string& i_rGroup, const boost::filesystem::path& i_rPath);
 
 	const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
-	/// Guards the groups: scenes ask on their render threads.
+	const std::shared_ptr<TesselPluginInterface::IJobRunner> m_pJobRunner;
+	const std::unique_ptr<IDelay> m_pDelay;
+	/// Guards the groups and the jobs: scenes ask on their render threads.
 	std::mutex m_Mutex;
 	std::unordered_map<std::string, VSkinGroup> m_Groups;
+	/// Begun, and not told to have ended.
+	std::vector<std::shared_ptr<VSkinLoadJob>> m_Jobs;
 	NVX::VSignal<> m_ChangedSignal;
-	QTimer m_ChangeTimer;
+	NVX::VSignal<> m_LoadingSignal;
 	bool m_bDisposed = false;
 };
 
