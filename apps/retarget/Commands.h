@@ -16,6 +16,7 @@ VCommand AddTargetsCommand(CLI::App& io_rProgram);
 VCommand AddCheckCommand(CLI::App& io_rProgram);
 VCommand AddCreateCommand(CLI::App& io_rProgram);
 VCommand AddEditCommand(CLI::App& io_rProgram);
+VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender);
 /// Hidden: prints the manual page or the shell completion of the option table.
 VCommand AddDocumentationCommand(CLI::App& io_rProgram);
 

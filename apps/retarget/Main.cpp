@@ -1,6 +1,9 @@
 #include "retarget/Program.h"
+#include "retarget/Renderer.h"
 
 int main(int i_Count, char** i_ppArguments)
 {
-	return CommandLine::Run({i_ppArguments + 1, i_ppArguments + i_Count});
+	const std::vector<std::string> arguments(i_ppArguments + 1, i_ppArguments + i_Count);
+	return CommandLine::Run(
+	    arguments, [&](const CommandLine::VRenderSettings&) { return CommandLine::RunRenderer(arguments); });
 }

@@ -75,7 +75,7 @@ CLI::App* AddCommand(CLI::App& io_rProgram, const std::string& i_rName, const st
 	return pApp;
 }
 
-VProgram MakeProgram()
+VProgram MakeProgram(const VRender& i_rRender)
 {
 	VProgram program;
 	program.m_pMessages = std::make_shared<VMessageSettings>();
@@ -87,19 +87,21 @@ VProgram MakeProgram()
 	rApp.footer(c_pWalkThrough);
 	rApp.require_subcommand(0, 1);
 	rApp.allow_extras();
-	for (const auto pAdd :
-	    {AddCreateCommand, AddEditCommand, AddTargetsCommand, AddCheckCommand, AddFbxCommand, AddDumpCommand,
-	        AddFkCommand, AddConvertCommand, AddSchemaCommand, AddEvalCommand, AddDocumentationCommand})
-		program.m_Commands.push_back(pAdd(rApp));
+	const auto addRender = [&](CLI::App& io_rProgram) { return AddRenderCommand(io_rProgram, i_rRender); };
+	using VAdd = std::function<VCommand(CLI::App&)>;
+	for (const VAdd& rAdd : {VAdd(AddCreateCommand), VAdd(AddEditCommand), VAdd(AddTargetsCommand),
+	         VAdd(AddCheckCommand), VAdd(addRender), VAdd(AddFbxCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand),
+	         VAdd(AddConvertCommand), VAdd(AddSchemaCommand), VAdd(AddEvalCommand), VAdd(AddDocumentationCommand)})
+		program.m_Commands.push_back(rAdd(rApp));
 	AddMessageOptions(rApp, program.m_pMessages);
 	for (const VCommand& rCommand : program.m_Commands)
 		AddMessageOptions(*rCommand.m_pApp, program.m_pMessages);
 	return program;
 }
 
-int Run(std::vector<std::string> i_Arguments)
+int Run(std::vector<std::string> i_Arguments, const VRender& i_rRender)
 {
-	VProgram program = MakeProgram();
+	VProgram program = MakeProgram(i_rRender);
 	std::shared_ptr<void> pMessages = ShowMessages({});
 	try
 	{

@@ -2,6 +2,7 @@
 
 #include "retarget/ExitStatus.h"
 #include "retarget/Messages.h"
+#include "retarget/RenderCommand.h"
 
 #include <CLI/CLI.hpp>
 
@@ -28,13 +29,14 @@ struct VProgram
 	std::shared_ptr<VMessageSettings> m_pMessages;
 };
 
-VProgram MakeProgram();
+/// @param i_rRender what draws, where the table is not only to be shown
+VProgram MakeProgram(const VRender& i_rRender = {});
 
 /// Adds a command with its description and its examples, one to a line and without the program's name.
 CLI::App* AddCommand(CLI::App& io_rProgram, const std::string& i_rName, const std::string& i_rDescription,
     const std::vector<std::string>& i_rExamples);
 
 /// Parses and runs a command line, the program's own name left out.
-int Run(std::vector<std::string> i_Arguments);
+int Run(std::vector<std::string> i_Arguments, const VRender& i_rRender);
 
 } // namespace CommandLine

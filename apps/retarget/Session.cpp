@@ -43,7 +43,7 @@ std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_r
 
 VSession::VSession()
     : m_pDispatcher(std::make_shared<InMemoryHost::VDispatcher>()),
-      m_pDocument(std::make_unique<VRetargetSetup>(m_pDispatcher,
+      m_pDocument(std::make_shared<VRetargetSetup>(m_pDispatcher,
           NVX::CountedPointer<TesselPluginInterface::IFrameFactory>(new InMemoryHost::VFrameFactory),
           NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)))
 {

@@ -44,6 +44,8 @@ public:
 	void Save(const std::string& i_rPath);
 
 	VRetargetSetup& Document() { return *m_pDocument; }
+	const std::shared_ptr<VRetargetSetup>& SharedDocument() const { return m_pDocument; }
+	const std::shared_ptr<InMemoryHost::VDispatcher>& Dispatcher() const { return m_pDispatcher; }
 
 	/// Runs what the document has posted.
 	void Settle() { m_pDispatcher->RunPending(); }
@@ -62,7 +64,7 @@ public:
 
 private:
 	std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher;
-	std::unique_ptr<VRetargetSetup> m_pDocument;
+	std::shared_ptr<VRetargetSetup> m_pDocument;
 	std::optional<VCharacterFile> m_File;
 };
 

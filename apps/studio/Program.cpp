@@ -1,13 +1,12 @@
 #include "studio/Program.h"
 
 #include "DebugServices/GlobalLog.h"
-#include "retarget/ExitStatus.h"
+#include "retarget/Display.h"
 #include "studio/DarkStyle.h"
 #include "studio/Module.h"
 #include "studio/OpenGLCheck.h"
 #include "studio/Options.h"
 #include "studio/QtDispatcher.h"
-#include "studio/QtMessages.h"
 #include "studio/RetargetPanel.h"
 #include "studio/Screenshot.h"
 #include "studio/StudioWindow.h"
@@ -69,15 +68,6 @@ private:
 	std::atomic<int> m_Count{0};
 	const std::shared_ptr<void> m_pSink;
 };
-
-/// Qt ends the process when there is no display.
-bool HasDisplay()
-{
-	for (const char* pName : {"DISPLAY", "WAYLAND_DISPLAY", "QT_QPA_PLATFORM"})
-		if (!qEnvironmentVariableIsEmpty(pName))
-			return true;
-	return false;
-}
 
 int Fail(CommandLine::EExitStatus i_Status, const std::string& i_rMessage)
 {
@@ -154,10 +144,10 @@ int Run(int i_Count, char** i_ppArguments)
 			std::fputs(text.c_str(), stdout);
 			return EFine;
 		}
-		if (!HasDisplay())
-			return Fail(EBadInput, "There is no display to show a window on: set DISPLAY, or use the program retarget");
+		pMessages.reset();
 		pMessages = ShowMessagesOnTerminal(options->m_Messages);
-		SendQtMessagesToLog();
+		CommandLine::PrepareDisplay({c_pCategory, EBadInput,
+		    "There is no display to show a window on: set DISPLAY, or use the program retarget"});
 		QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts);
 		QCoreApplication::setOrganizationName(QStringLiteral("RetargetSetup"));
 		QCoreApplication::setApplicationName(QStringLiteral("retarget-studio"));

@@ -49,6 +49,11 @@ TEST(Usage, WrongWords)
 	        {"pose", {"fk", c_Performer, "--pose", "rest"}, 2, "", "rest not in {bind,mean,tpose}"},
 	        {"version", {"convert", c_Performer, "x.qrs", "--format-version", "3.6"}, 2, "",
 	            "the format has no version \"3.6\", only 1.0 1.5 2.0"},
+	        {"size", {"render", "x.qrr", "-o", "x.png", "--size", "64x9"}, 2, "",
+	            "--size: \"64x9\" is not WIDTHxHEIGHT with 16 to 4096 pixels each"},
+	        {"size in words", {"render", "x.qrr", "-o", "x.png", "--size", "64x64x"}, 2, "", "is not WIDTHxHEIGHT"},
+	        {"view", {"render", "x.qrr", "-o", "x.png", "--view", "side"}, 2, "", "side not in {perspective,front,"},
+	        {"no picture", {"render", "x.qrr", "-o", "x.jpg"}, 2, "", "\"x.jpg\": the picture is written as PNG"},
 	        {"state", {"fk", c_Performer, "--state", "1,2"}, 2, "", "take 67 numbers, not 2"},
 	    },
 	    folder);

@@ -56,6 +56,9 @@ TEST_F(Program, TellsItsVersionAndWrongUsageWithoutADisplay)
 	EXPECT_EQ(Run({}, noDisplay), 3);
 	EXPECT_EQ(m_Err,
 	    "error retarget-studio: There is no display to show a window on: set DISPLAY, or use the program retarget\n");
+	EXPECT_EQ(Run({}, {{"DISPLAY", ":32123"}, {"QT_QPA_PLATFORM", "xcb"}}), 3);
+	EXPECT_TRUE(m_Err.endsWith("There is no display to show a window on: set DISPLAY, or use the program retarget\n"))
+	    << m_Err.toStdString();
 }
 
 TEST_F(Program, TakesAPicture)

@@ -45,6 +45,22 @@ VRetargetSetupScene::VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLi
 
 VRetargetSetupScene::~VRetargetSetupScene() = default;
 
+QVariantMap VRetargetSetupScene::ViewOptions()
+{
+	return {
+	    {"LabellingSubject-Enabled", true},
+	    {"LabellingSubject-Markers", false},
+	    {"LabellingSubject-Sticks", false},
+	    {"LabellingSubject-Targets", false},
+	    {"LabellingSubject-SkinXRay", true},
+	    {"SolvingSubject-Markers", false},
+	    {"SolvingSubject-Sticks", false},
+	    {"SolvingSubject-MissingMarkers", false},
+	    {"SolvingSubject-SkinXRay", true},
+	    {"SolvingSubject-Targets", true},
+	};
+}
+
 void VRetargetSetupScene::OnShared()
 {
 	auto pPose = std::make_unique<Flow2Utils::VParameterTyped<std::uint32_t>>("PoseIndex");

@@ -6,6 +6,7 @@
 #include "TesselPluginInterface/IItemFactory.h"
 
 #include <QMatrix4x4>
+#include <QVariantMap>
 
 #include <cstdint>
 #include <memory>
@@ -24,6 +25,8 @@ class VFlowSubjectSceneTransform;
 class VRetargetSetupScene : public Flow2Graphics::VFlowScene, public NVX::VShared
 {
 	Q_OBJECT
+	/// What a view of it begins with, by the keys of the scene's options.
+	Q_PROPERTY(QVariantMap viewOptions READ ViewOptions CONSTANT)
 
 public:
 	VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pGraphicsContext,
@@ -32,6 +35,8 @@ public:
 	    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache, std::shared_ptr<VRetargetSetup> i_pRetargetSetup,
 	    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory, bool i_bAllowHiddenPick);
 	~VRetargetSetupScene() override;
+
+	static QVariantMap ViewOptions();
 
 	/// Shows what the document has now.
 	void RefreshScene();

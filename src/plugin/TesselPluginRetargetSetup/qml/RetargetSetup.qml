@@ -335,18 +335,7 @@ Rectangle {
 					Accessible.name: "Preview"
 
 					Component.onCompleted: {
-						const options = {
-							"LabellingSubject-Enabled": true,
-							"LabellingSubject-Markers": false,
-							"LabellingSubject-Sticks": false,
-							"LabellingSubject-Targets": false,
-							"LabellingSubject-SkinXRay": true,
-							"SolvingSubject-Markers": false,
-							"SolvingSubject-Sticks": false,
-							"SolvingSubject-MissingMarkers": false,
-							"SolvingSubject-SkinXRay": true,
-							"SolvingSubject-Targets": true
-						}
+						const options = FlowScene.viewOptions
 						for (const key in options)
 							sceneOptions[key] = options[key]
 					}

@@ -1,0 +1,155 @@
+#include "Rows.h"
+
+#include "CoreGraphics/ShaderLibrary.h"
+#include "InMemoryHost/Flow.h"
+#include "InMemoryHost/Selection.h"
+#include "OrlexGraphics/SceneFramebufferObject.h"
+#include "OrlexGraphics/SkinCache.h"
+#include "TesselPluginRetargetSetup/RetargetSetupScene.h"
+#include "retarget/RenderCommand.h"
+#include "retarget/Session.h"
+
+#include <QImage>
+#include <QQuickWidget>
+#include <QTest>
+
+namespace
+{
+
+const std::string c_Performer = Data("qrt/performer.qrs");
+
+/// A folder with a retarget subject in it.
+class VSubjectFolder : public VScratchFolder
+{
+public:
+	VSubjectFolder()
+	{
+		const VRun run = RunRetarget(
+		    {"-q", "create", "--fbx", Data("fbx/own_ns_yup_cm_b7400.fbx"), "--source", c_Performer, "--position",
+		        "Hips:Hips", "--symmetry", "--rotation", "LeftArm:LeftArm", "--update-targets", "-o", "x.qrr"},
+		    Path());
+		EXPECT_EQ(run.m_Status, 0) << run.m_Err;
+	}
+};
+
+/// The preview as the panel has it, in a window of its own.
+class VPreview
+{
+public:
+	explicit VPreview(const std::string& i_rSubject)
+	{
+		m_Session.LoadTarget(i_rSubject);
+		m_Session.LoadSource(c_Performer);
+		m_pScene = NVX::MakeShared<VRetargetSetupScene>(std::make_shared<CoreGraphics::VShaderLibrary>(),
+		    m_Session.Dispatcher(), m_pSelection, NVX::MakeShared<OrlexGraphics::VSkinCache>(m_Session.Dispatcher()),
+		    m_Session.SharedDocument(),
+		    NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory), false);
+		m_pItem = new OrlexGraphics::VSceneFramebufferObject;
+		m_pItem->SetScene(m_pScene.get());
+		const QVariantMap options = m_pScene->property("viewOptions").toMap();
+		for (auto it = options.begin(); it != options.end(); ++it)
+		{
+			m_pItem->GetSceneOptions()->insert(it.key(), it.value());
+			m_pItem->OnSceneOptionsMapChanged(it.key(), it.value());
+		}
+		m_Widget.setResizeMode(QQuickWidget::SizeRootObjectToView);
+		m_Widget.setContent(QUrl(), nullptr, m_pItem);
+		m_Widget.resize(320, 200);
+		m_Widget.show();
+	}
+
+	/// With all segments of both subjects in the view, and none selected.
+	QImage Draw(int i_CameraType)
+	{
+		m_pItem->SetCameraType(i_CameraType);
+		std::vector<NVX::ISelectionItem> all;
+		for (std::uint32_t i = 0; i < 100; ++i)
+			for (const std::uint32_t kind : {NVX::ESelectionSourceSegment, NVX::ESelectionTargetSegment})
+				all.push_back({kind, 0x0fffffff, i, {}});
+		m_pSelection->Selection().Replace(all);
+		Settle();
+		m_pItem->SetFocusSelection(true);
+		Settle();
+		m_pSelection->Selection().Replace({});
+		Settle();
+		return m_Widget.grabFramebuffer();
+	}
+
+private:
+	/// What a frame finds changed asks for another one.
+	void Settle()
+	{
+		for (int i = 0; i < 4; ++i)
+		{
+			m_Session.Settle();
+			QCoreApplication::processEvents();
+			m_Widget.grabFramebuffer();
+		}
+	}
+
+	CommandLine::VSession m_Session;
+	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
+	    std::make_shared<InMemoryHost::VSelectionManager>();
+	std::shared_ptr<VRetargetSetupScene> m_pScene;
+	QQuickWidget m_Widget;
+	/// The widget owns it.
+	OrlexGraphics::VSceneFramebufferObject* m_pItem = nullptr;
+};
+
+TEST(Render, DrawsWhatThePreviewShows)
+{
+	const VSubjectFolder folder;
+	VPreview preview((folder / "x.qrr").string());
+	QImage before;
+	for (std::size_t i = 0; i < CommandLine::c_Views.size(); ++i)
+	{
+		const std::string view = CommandLine::c_Views[i];
+		SCOPED_TRACE(view);
+		const VRun run = RunRetarget({"-q", "render", "x.qrr", "--source", c_Performer, "--view", view, "--size",
+		                                 "320x200", "-o", view + ".png"},
+		    folder.Path());
+		EXPECT_EQ(run.m_Status, 0) << run.m_Err;
+		const QImage drawn = QImage(QString::fromStdString((folder / (view + ".png")).string()));
+		EXPECT_EQ(drawn.convertToFormat(QImage::Format_RGB32),
+		    preview.Draw(static_cast<int>(i)).convertToFormat(QImage::Format_RGB32));
+		EXPECT_NE(drawn, before);
+		before = drawn;
+	}
+	EXPECT_EQ(folder.Names().size(), CommandLine::c_Views.size() + 1);
+	const VRun run = RunRetarget(
+	    {"-q", "render", "x.qrr", "--source", c_Performer, "--view", "bottom", "--size", "320x200", "-o", "-"},
+	    folder.Path());
+	EXPECT_EQ(run.m_Out, folder.Read("bottom.png"));
+}
+
+TEST(Render, TellsWhatItLacks)
+{
+	const VSubjectFolder folder;
+	const std::string noDisplay = "error retarget: There is no display to draw with: set DISPLAY";
+	const struct
+	{
+		const char* m_pDisplay;
+		const char* m_pPlatform;
+		VRow m_Row;
+	} rows[] = {
+	    {"", "", {"no display", {"-q", "render", "x.qrr", "-o", "x.png"}, 4, "", noDisplay}},
+	    {":32123", "xcb", {"no such display", {"-q", "render", "x.qrr", "-o", "x.png"}, 4, "", noDisplay}},
+	    {"", "offscreen",
+	        {"no OpenGL", {"-q", "render", "x.qrr", "-o", "x.png"}, 4, "", "(offscreen) has no OpenGL to draw with"}},
+	    {"", "", {"files come first", {"render", "nowhere.qrr", "-o", "x.png"}, 3, "", "\"nowhere.qrr\" could not be read"}},
+	    {nullptr, nullptr, {"no such folder", {"-q", "render", "x.qrr", "-o", "no/x.png"}, 4, "", "error retarget: "}},
+	};
+	for (const auto& rRow : rows)
+	{
+		const QByteArray display = qgetenv("DISPLAY"), platform = qgetenv("QT_QPA_PLATFORM");
+		if (rRow.m_pDisplay)
+			qputenv("DISPLAY", rRow.m_pDisplay);
+		if (rRow.m_pPlatform)
+			qputenv("QT_QPA_PLATFORM", rRow.m_pPlatform);
+		RunRows({rRow.m_Row}, folder);
+		qputenv("DISPLAY", display);
+		qputenv("QT_QPA_PLATFORM", platform);
+	}
+}
+
+} // namespace
