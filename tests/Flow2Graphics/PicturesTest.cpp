@@ -286,6 +286,11 @@ TEST_P(Pictures, OfTheManipulator)
 		Compare(Draw(view), rRow.m_pName);
 		rManipulator.Release();
 	}
+	// On a fine display it is as large in millimetres of the display.
+	const QImage doubled = Draw(c_Small);
+	m_Renderer.m_Input.m_PixelRatio = 2.0;
+	Options().m_ManipulatorScale *= 0.5f;
+	EXPECT_EQ(Draw(c_Small), doubled);
 }
 
 TEST_P(Pictures, TakeNoMemoryForAFrameThatDoesNotChange)

@@ -133,6 +133,16 @@ TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
 	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
 	m_pSelection->Selection().Replace({Item(1)});
 	Frame();
+	// Samples and channels of what is drawn into.
+	const bool bES2 = GetParam() == GraphicsTest::EDialect::ES2;
+	for (const bool bCameraView : {true, false})
+	{
+		m_Renderer.m_Input.m_Options.m_bCameraView = bCameraView;
+		const QOpenGLFramebufferObjectFormat format = m_Renderer.TargetFormat();
+		EXPECT_EQ(format.samples(), bES2 || bCameraView ? 0 : 4);
+		EXPECT_EQ(format.attachment(), QOpenGLFramebufferObject::Depth);
+		EXPECT_EQ(format.internalTextureFormat(), static_cast<GLenum>(bES2 ? GL_RGBA : GL_RGB));
+	}
 	const QImage image = m_pTarget->toImage();
 	EXPECT_EQ(image.pixel(40, 40), 0xff4040ffu);
 	EXPECT_EQ(image.pixel(120, 40), 0xff0000ffu);

@@ -68,7 +68,7 @@ TEST_P(RenderManipulator, HandlesKeepTheirSizeOnTheScreen)
 		std::uint32_t m_Type;
 		float m_Distance;
 		float m_Scale;
-		float m_DPIRatio;
+		float m_PixelRatio;
 		float m_Factor;
 	};
 	const VRow rows[] = {{"fixed", CoreGraphics::ECameraRight, 7000, 1, 1, 1},
@@ -86,7 +86,7 @@ TEST_P(RenderManipulator, HandlesKeepTheirSizeOnTheScreen)
 		m_Camera.m_Type = rRow.m_Type;
 		m_Camera.m_Distance = rRow.m_Distance;
 		m_Options.m_ManipulatorScale = rRow.m_Scale;
-		m_pManipulator->SetDPIRatio(rRow.m_DPIRatio);
+		m_Render.m_PixelRatio = rRow.m_PixelRatio;
 		DrawFrame();
 		// A shaft from 10 to 90 and a head to 120 pixels, whose tip is thinner than a pixel; the head of X covers the
 		// beginning.

@@ -1,6 +1,7 @@
 #include "OrlexGraphics/SceneFramebufferRenderer.h"
 #include "ViewFixture.h"
 
+#include <QMetaProperty>
 #include <QQmlPropertyMap>
 #include <QSignalSpy>
 
@@ -10,6 +11,86 @@ namespace
 {
 
 constexpr QRgb c_Background = 0xff202020;
+
+TEST(SceneFramebufferObject, IsWhatQmlKnowsItAs)
+{
+	const struct
+	{
+		const char* m_pName;
+		const char* m_pNotify;
+		QVariant m_Default;
+		/// Another value, and how often it is told of when it is set twice. Invalid if QML only reads it.
+		QVariant m_Other = {};
+		int m_Told = 0;
+	} rows[] = {
+	    {"scene", "", QVariant::fromValue<QObject*>(nullptr), QVariant::fromValue<QObject*>(nullptr)},
+	    {"cameraGrid", "", QVariant::fromValue<QObject*>(nullptr), QVariant::fromValue<QObject*>(nullptr)},
+	    {"sceneOptions", "SceneOptionsChanged", {}},
+	    {"previewCamera", "PreviewCameraChanged", "", "urn:7", 2},
+	    {"cameraType", "", 0, 6},
+	    {"toolTipText", "ToolTipTextChanged", "", "Arm", 1},
+	    {"mousePos", "MouseMoved", QPoint(), QPoint(3, 4), 1},
+	    {"showCameraNumbers", "ShowCameraNumbersChanged", false, true, 1},
+	    {"cameraObjects", "CamerasChanged", QVariant::fromValue(QList<QObject*>())},
+	    {"subjectObjects", "SubjectsChanged", QVariant::fromValue(QList<QObject*>()),
+	        QVariant::fromValue(QList<QObject*>{nullptr}), 1},
+	    {"focusSelection", "", false, false},
+	    {"tracking", "TrackSelectionChanged", QVariant::fromValue(OrlexGraphics::ETrackingNone),
+	        QVariant::fromValue(OrlexGraphics::ETrackingTransform), 2},
+	};
+	OrlexGraphics::VSceneFramebufferObject item;
+	const QMetaObject& rMeta = OrlexGraphics::VSceneFramebufferObject::staticMetaObject;
+	ASSERT_EQ(rMeta.propertyCount() - rMeta.propertyOffset(), static_cast<int>(std::size(rows)));
+	for (const auto& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		const QMetaProperty property = rMeta.property(rMeta.propertyOffset() + static_cast<int>(&rRow - rows));
+		EXPECT_STREQ(property.name(), rRow.m_pName);
+		EXPECT_EQ(property.notifySignal().name(), rRow.m_pNotify);
+		EXPECT_EQ(property.isWritable(), rRow.m_Other.isValid());
+		if (rRow.m_Default.isValid())
+		{
+			EXPECT_EQ(property.read(&item), rRow.m_Default);
+		}
+		if (!property.isWritable())
+			continue;
+		std::unique_ptr<QSignalSpy> pTold;
+		if (property.hasNotifySignal())
+			pTold = std::make_unique<QSignalSpy>(&item, property.notifySignal());
+		EXPECT_TRUE(property.write(&item, rRow.m_Other));
+		EXPECT_TRUE(property.write(&item, rRow.m_Other));
+		EXPECT_EQ(property.read(&item), rRow.m_Other);
+		EXPECT_EQ(pTold ? pTold->count() : 0, rRow.m_Told);
+	}
+	const char* const c_Signals[] = {"SceneOptionsChanged", "PreviewCameraChanged", "ToolTipTextChanged", "MouseMoved",
+	    "CamerasChanged", "SubjectsChanged", "ShowCameraNumbersChanged", "TrackSelectionChanged", "OnFocusChanged",
+	    "OnSceneOptionsMapChanged"};
+	for (const char* const& rpName : c_Signals)
+		EXPECT_EQ(rMeta.method(rMeta.methodOffset() + static_cast<int>(&rpName - c_Signals)).name(), rpName);
+
+	for (const int type : {7, -1, 1000000})
+	{
+		item.setProperty("cameraType", type);
+		EXPECT_EQ(item.property("cameraType"), 6) << type;
+	}
+	EXPECT_EQ(item.acceptedMouseButtons(), Qt::AllButtons);
+	EXPECT_TRUE(item.acceptHoverEvents());
+	EXPECT_TRUE(item.mirrorVertically());
+	item.SetSubjectObjects({});
+}
+
+TEST_F(VViewTest, ADoubleClickPreviewsTheSelectedCamera)
+{
+	Show();
+	m_pScene->SelectCamera("urn:7", false);
+	m_pScene->SelectCamera("urn:8", true);
+	EXPECT_EQ(m_pSelection->PreSelection().Items(), (std::vector<NVX::ISelectionItem>{{1, 0, 0, "urn:8"}}));
+	Mouse(QEvent::MouseButtonDblClick, {40, 40}, Qt::LeftButton, Qt::LeftButton);
+	EXPECT_EQ(m_pView->GetPreviewCamera(), "urn:7");
+	m_pScene->SelectCamera("", false);
+	Mouse(QEvent::MouseButtonDblClick, {40, 40}, Qt::LeftButton, Qt::LeftButton);
+	EXPECT_EQ(m_pView->GetPreviewCamera(), "");
+}
 
 TEST_F(VViewTest, DrawsTheBackgroundColour)
 {

@@ -82,6 +82,8 @@ public:
 	QVector3D m_Up{0.0f, 0.0f, 1.0f};
 	/// Of the whole frame, in device pixels.
 	QSize m_FrameSize;
+	/// Pixels of the device by those that sizes on the screen count in: more than 1 on a fine display.
+	float m_PixelRatio = 1.0f;
 	bool m_bYUp = false;
 	/// Seconds in the day.
 	float m_GlobalTime = 0.0f;

@@ -15,8 +15,10 @@
 #include "OrlexGraphics/RenderOutlines.h"
 #include "OrlexGraphics/RenderReconstructionVolume.h"
 #include "OrlexGraphics/RenderVolumeManipulator.h"
+#include "OrlexGraphics/SelectionKinds.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SkinCache.h"
+#include "TesselPluginInterface/ISelectionManager.h"
 
 #include <QPointer>
 
@@ -207,6 +209,24 @@ std::vector<NVX::ISelectionItem> VFlowScene::MakeSelection(
 				o_rNames.push_back(rName);
 		}
 	return items;
+}
+
+QString VFlowScene::GetSelectedCamera() const
+{
+	if (!SelectionManager())
+		return {};
+	const auto cameras = SelectionManager()->Selection().ItemsOfKind(OrlexGraphics::ESelectionCamera);
+	return cameras.empty() ? QString() : QString::fromStdString(cameras.front().m_Name);
+}
+
+void VFlowScene::SelectCamera(const QString& i_rDeviceURN, bool i_bPreselect)
+{
+	if (!SelectionManager())
+		return;
+	std::vector<NVX::ISelectionItem> items;
+	if (!i_rDeviceURN.isEmpty())
+		items.push_back({OrlexGraphics::ESelectionCamera, 0, 0, i_rDeviceURN.toStdString()});
+	(i_bPreselect ? SelectionManager()->PreSelection() : SelectionManager()->Selection()).Replace(items);
 }
 
 } // namespace Flow2Graphics

@@ -61,6 +61,9 @@ public:
 	    const std::vector<NVX::ISelectionItem>& i_rSelection, QMatrix4x4& o_rTransform) const override;
 	std::vector<NVX::ISelectionItem> MakeSelection(
 	    const std::vector<std::uint32_t>& i_rIds, std::vector<std::string>& o_rNames) const override;
+	QString GetSelectedCamera() const override;
+	/// Alone; no camera for an empty URN.
+	void SelectCamera(const QString& i_rDeviceURN, bool i_bPreselect) override;
 
 private:
 	void AddSubjects();

@@ -96,6 +96,7 @@ void VFrameRenderer::BeginFrame()
 	m_Input.m_Camera.Apply(m_Context);
 	m_Context.SetViewport(QRect(QPoint(), m_Size));
 	m_Context.m_FrameSize = m_Size;
+	m_Context.m_PixelRatio = static_cast<float>(m_Input.m_PixelRatio);
 	m_Context.SetYUp(bYUp);
 	m_Context.m_LightVector = (bYUp ? QVector3D(1.0f, 3.0f, 1.0f) : QVector3D(1.0f, 1.0f, 3.0f)).normalized();
 	m_Context.m_GlobalTime = static_cast<float>(QTime::currentTime().msecsSinceStartOfDay()) * 0.001f;

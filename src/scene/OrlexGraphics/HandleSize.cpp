@@ -11,7 +11,7 @@ std::optional<float> PixelSizeAt(const CoreGraphics::VRenderContext& i_rContext,
 	const float pixels = static_cast<float>(i_rContext.m_Viewport.height()) * i_rContext.m_Projection(1, 1) * 0.5f;
 	if (!(clip.w() > 0.0f) || !(pixels > 0.0f))
 		return {};
-	return clip.w() / pixels;
+	return i_rContext.m_PixelRatio * clip.w() / pixels;
 }
 
 } // namespace OrlexGraphics

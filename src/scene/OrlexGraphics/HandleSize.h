@@ -12,7 +12,7 @@ class VRenderContext;
 namespace OrlexGraphics
 {
 
-/// Millimetres of a pixel of the viewport, where the place is. Nothing behind the eye.
+/// Millimetres of a pixel that sizes on the screen count in, where the place is. Nothing behind the eye.
 std::optional<float> PixelSizeAt(const CoreGraphics::VRenderContext& i_rContext, const QVector3D& i_rPlace);
 
 } // namespace OrlexGraphics

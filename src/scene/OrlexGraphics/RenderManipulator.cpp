@@ -193,7 +193,7 @@ void VRenderManipulator::Render(VRenderContext& io_rContext, const VSceneOptions
 	if (!io_rContext.UseProgram(m_pDrawing->m_Program.Get(bPick)))
 		return;
 	io_rContext.ApplyState(bPick ? CoreGraphics::MakeSelectionState(HandleState()) : HandleState());
-	const float size = m_Drawn.m_DPIRatio * i_rOptions.m_ManipulatorScale * *pixelSize;
+	const float size = i_rOptions.m_ManipulatorScale * *pixelSize;
 	for (std::uint32_t axis = 0; axis < 3; ++axis)
 		RenderAxis(io_rContext, axis, size);
 }

@@ -57,8 +57,6 @@ public:
 	const QMatrix4x4& Transform() const { return m_State.m_Transform; }
 	/// As it was given to SetTransform last.
 	const QMatrix4x4& GivenTransform() const { return m_GivenTransform; }
-	/// Pixels of the device for each that the size of the handles counts in.
-	void SetDPIRatio(float i_Ratio) { m_State.m_DPIRatio = i_Ratio; }
 
 	NVX::VSignal<>& BeginSignal() { return m_BeginSignal; }
 	NVX::VSignal<QMatrix4x4>& ChangedSignal() { return m_ChangedSignal; }
@@ -89,7 +87,6 @@ private:
 		bool m_bVisible = false;
 		std::uint32_t m_ModeMask = 0xff;
 		QMatrix4x4 m_Transform;
-		float m_DPIRatio = 1.0f;
 		std::optional<VManipulatorHandle> m_Dragged;
 	};
 
