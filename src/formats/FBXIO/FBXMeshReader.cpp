@@ -8,6 +8,7 @@
 #include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <map>
 
@@ -23,12 +24,46 @@ struct VInfluence
 {
 	std::int32_t m_Bone = 0;
 	float m_Weight = 0.0f;
+
+	bool IsBefore(const VInfluence& i_rOther) const
+	{
+		return m_Weight != i_rOther.m_Weight ? m_Weight > i_rOther.m_Weight : m_Bone < i_rOther.m_Bone;
+	}
+};
+
+constexpr std::size_t c_MostInfluences = 4;
+
+/// The largest influences on a point, in order.
+struct VInfluences
+{
+	std::array<VInfluence, c_MostInfluences> m_Largest;
+	/// One more than there can be if any was dropped.
+	std::size_t m_Count = 0;
+
+	/// @return the weight that is dropped for it; 0 if none is.
+	float Add(const VInfluence& i_rInfluence)
+	{
+		float dropped = 0.0f;
+		std::size_t at = m_Count++;
+		if (at >= c_MostInfluences)
+		{
+			m_Count = c_MostInfluences + 1;
+			at = c_MostInfluences - 1;
+			dropped = std::min(m_Largest[at].m_Weight, i_rInfluence.m_Weight);
+			if (!i_rInfluence.IsBefore(m_Largest[at]))
+				return dropped;
+		}
+		for (; at > 0 && i_rInfluence.IsBefore(m_Largest[at - 1]); --at)
+			m_Largest[at] = m_Largest[at - 1];
+		m_Largest[at] = i_rInfluence;
+		return dropped;
+	}
 };
 
 QVector4D ColourAndFactor(const FbxPropertyT<FbxDouble3>& i_rColour, const FbxPropertyT<FbxDouble>& i_rFactor)
 {
 	const FbxDouble3 colour = i_rColour.Get();
-	return {float(colour[0]), float(colour[1]), float(colour[2]), float(i_rFactor.Get())};
+	return {Finite(colour[0]), Finite(colour[1]), Finite(colour[2]), Finite(i_rFactor.Get())};
 }
 
 FbxSkin* FindSkin(FbxNode& i_rNode)
@@ -48,18 +83,25 @@ void ForEachCluster(FbxSkin& i_rSkin, TVisit&& i_Visit)
 }
 
 /// Fractions are cut off: what is missing to 255 is lost.
-void Quantise(const VInfluence* i_pInfluences, std::size_t i_Count, double i_Sum, VSkinVertex& o_rVertex)
+/// @return false if the weights give nothing.
+bool Quantise(const VInfluences& i_rInfluences, VSkinVertex& o_rVertex)
 {
+	const std::size_t count = std::min(i_rInfluences.m_Count, c_MostInfluences);
+	double sum = 0.0;
+	for (std::size_t i = 0; i < count; ++i)
+		sum += i_rInfluences.m_Largest[i].m_Weight;
 	int remaining = 255;
-	for (std::size_t i = 0; i < i_Count; ++i)
+	for (std::size_t i = 0; i < count; ++i)
 	{
-		o_rVertex.m_BoneIndices[i] = std::uint8_t(i_pInfluences[i].m_Bone);
-		if (!(i_Sum > 0.0))
+		o_rVertex.m_BoneIndices[i] = std::uint8_t(i_rInfluences.m_Largest[i].m_Bone);
+		if (!(sum > 0.0))
 			continue;
-		const int part = int(std::clamp(i_pInfluences[i].m_Weight * 255.0 / i_Sum, 0.0, double(remaining)));
-		o_rVertex.m_BoneWeights[i] = std::uint8_t(part);
-		remaining -= part;
+		const double part = i_rInfluences.m_Largest[i].m_Weight * 255.0 / sum;
+		const int weight = int(std::clamp(part, 0.0, double(remaining)));
+		o_rVertex.m_BoneWeights[i] = std::uint8_t(weight);
+		remaining -= weight;
 	}
+	return sum > 0.0;
 }
 
 bool Exists(const boost::filesystem::path& i_rPath)
@@ -103,25 +145,25 @@ void FBXIO::FBXMeshReader::Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TV
 		ReadMaterial(i_rNode.GetMaterial(i), o_rMesh.m_Parts[i]);
 
 	o_rMesh.m_Vertices.assign(count, TVertex());
+	const auto& rNormals = pNormals->GetDirectArray();
 	std::size_t broken = 0;
 	for (int i = 0; i < count; ++i)
 	{
+		TVertex& rVertex = o_rMesh.m_Vertices[i];
 		const FbxVector4 point = io_rFrom.GetControlPointAt(i);
-		const FbxVector4 normal = pNormals->GetDirectArray().GetAt(i);
+		const FbxVector4 normal = rNormals.GetAt(i);
 		bool bSound = true;
 		for (int axis = 0; axis < 3; ++axis)
 		{
-			const float position = float(point[axis] * m_UnitScale);
-			bSound = bSound && std::isfinite(position);
-			o_rMesh.m_Vertices[i].m_Position[axis] = std::isfinite(position) ? position : 0.0f;
-			o_rMesh.m_Vertices[i].m_Normal[axis] = float(normal[axis]);
+			rVertex.m_Position[axis] = Finite(point[axis] * m_UnitScale, bSound);
+			rVertex.m_Normal[axis] = Finite(normal[axis], bSound);
 		}
 		broken += bSound ? 0 : 1;
 	}
 	if (broken > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
-		    "%1% control points of mesh %2% have coordinates that are no numbers; setting these to zero", broken,
-		    i_rNode.GetName());
+		    "%1% control points of mesh %2% have coordinates or normals that are no numbers; setting these to zero",
+		    broken, i_rNode.GetName());
 }
 
 template <typename TVertex>
@@ -141,7 +183,7 @@ void FBXIO::FBXMeshReader::ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPa
 	if (const auto* const pPhong = FbxCast<FbxSurfacePhong>(i_pMaterial))
 	{
 		io_rPart.m_Specular = ColourAndFactor(pPhong->Specular, pPhong->SpecularFactor);
-		io_rPart.m_Shininess = float(pPhong->Shininess.Get());
+		io_rPart.m_Shininess = Finite(pPhong->Shininess.Get());
 		io_rPart.m_Reflection = ColourAndFactor(pPhong->Reflection, pPhong->ReflectionFactor);
 	}
 	const auto* const pLambert = FbxCast<FbxSurfaceLambert>(i_pMaterial);
@@ -189,8 +231,8 @@ void FBXIO::FBXMeshReader::ReadPlacedMesh(FbxNode& i_rNode, std::vector<VPlacedM
 	VPlacedMesh placed;
 	placed.m_Name = i_rNode.GetName();
 	placed.m_Transform = SystemMatrix(i_rNode.EvaluateGlobalTransform());
-	CheckTransform(placed.m_Transform, placed.m_Name);
 	ScaleTranslation(placed.m_Transform, m_UnitScale);
+	CheckTransform(placed.m_Transform, placed.m_Name);
 	placed.m_Transform(3, 3) = 1.0f;
 	if (ReadMesh(i_rNode, placed.m_Mesh))
 		io_rMeshes.push_back(std::move(placed));
@@ -260,57 +302,34 @@ std::int64_t FBXIO::FBXMeshReader::BindBone(FbxCluster& i_rCluster)
 
 void FBXIO::FBXMeshReader::ReadWeights(FbxNode& i_rNode, FbxSkin& i_rSkin, std::vector<VSkinVertex>& io_rVertices)
 {
-	std::vector<std::pair<FbxCluster*, std::int64_t>> clusters;
-	ForEachCluster(i_rSkin, [&](FbxCluster& i_rCluster) { clusters.emplace_back(&i_rCluster, BindBone(i_rCluster)); });
+	std::vector<VInfluences> influences(io_rVertices.size());
 	std::size_t broken = 0;
-	const auto forEachWeight = [&](const auto& i_rVisit)
-	{
-		broken = 0;
-		for (const auto& [pCluster, bone] : clusters)
-		{
-			const int* const pPoints = pCluster->GetControlPointIndices();
-			const double* const pWeights = pCluster->GetControlPointWeights();
-			for (int i = 0, count = pCluster->GetControlPointIndicesCount(); i < count; ++i)
-			{
-				const float weight = float(pWeights[i]);
-				if (pPoints[i] >= 0 && std::size_t(pPoints[i]) < io_rVertices.size() && std::isfinite(weight))
-					i_rVisit(std::size_t(pPoints[i]), VInfluence{std::int32_t(bone), weight});
-				else
-					++broken;
-			}
-		}
-	};
-	// All lists in one: that of a point begins where the one before ends.
-	std::vector<std::size_t> ends(io_rVertices.size() + 1, 0);
-	forEachWeight([&ends](std::size_t i_Point, const VInfluence&) { ++ends[i_Point + 1]; });
-	for (std::size_t i = 1; i < ends.size(); ++i)
-		ends[i] += ends[i - 1];
-	std::vector<VInfluence> influences(ends.back());
-	forEachWeight(
-	    [&](std::size_t i_Point, const VInfluence& i_rInfluence) { influences[ends[i_Point]++] = i_rInfluence; });
+	float largestDropped = 0.0f;
+	ForEachCluster(i_rSkin,
+	    [&](FbxCluster& i_rCluster)
+	    {
+		    const auto bone = std::int32_t(BindBone(i_rCluster));
+		    const int* const pPoints = i_rCluster.GetControlPointIndices();
+		    const double* const pWeights = i_rCluster.GetControlPointWeights();
+		    for (int i = 0, count = i_rCluster.GetControlPointIndicesCount(); i < count; ++i)
+		    {
+			    const float weight = float(pWeights[i]);
+			    if (pPoints[i] >= 0 && std::size_t(pPoints[i]) < influences.size() && std::isfinite(weight))
+			    {
+				    const float dropped = influences[pPoints[i]].Add({bone, weight});
+				    largestDropped = dropped > largestDropped ? dropped : largestDropped;
+			    }
+			    else
+				    ++broken;
+		    }
+	    });
 
 	std::size_t overFull = 0;
 	std::size_t unweighted = 0;
-	float largestDropped = 0.0f;
-	std::size_t begin = 0;
-	for (std::size_t point = 0; point < io_rVertices.size(); begin = ends[point++])
+	for (std::size_t point = 0; point < io_rVertices.size(); ++point)
 	{
-		VInfluence* const pBegin = influences.data() + begin;
-		std::size_t count = ends[point] - begin;
-		std::sort(pBegin, pBegin + count,
-		    [](const VInfluence& i_rA, const VInfluence& i_rB)
-		    { return i_rA.m_Weight != i_rB.m_Weight ? i_rA.m_Weight > i_rB.m_Weight : i_rA.m_Bone < i_rB.m_Bone; });
-		if (count > 4)
-		{
-			++overFull;
-			largestDropped = std::max(largestDropped, pBegin[4].m_Weight);
-			count = 4;
-		}
-		double sum = 0.0;
-		for (std::size_t i = 0; i < count; ++i)
-			sum += pBegin[i].m_Weight;
-		unweighted += sum > 0.0 ? 0 : 1;
-		Quantise(pBegin, count, sum, io_rVertices[point]);
+		overFull += influences[point].m_Count > c_MostInfluences ? 1 : 0;
+		unweighted += Quantise(influences[point], io_rVertices[point]) ? 0 : 1;
 	}
 	if (broken > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning,

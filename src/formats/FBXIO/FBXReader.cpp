@@ -3,6 +3,7 @@
 #include "DebugServices/GlobalLog.h"
 #include "FBXIO/FBXMeshReader.h"
 #include "FBXIO/Matrices.h"
+#include "FBXIO/MemoryStream.h"
 #include "UtilsFileSystem/Paths.h"
 
 #include <boost/filesystem/operations.hpp>
@@ -17,6 +18,7 @@ public:
 	~VImpl();
 
 	bool LoadFile(const std::string& i_rPath);
+	bool LoadMemory(std::string_view i_Bytes, const std::string& i_rPath);
 
 	/// Calls i_rVisit with the node and all below it, in pre-order; true from it passes over what is below that node.
 	/// While it runs, m_NodeScale is the product of the local X scalings down to the node.
@@ -25,15 +27,21 @@ public:
 	/// Calls i_rVisit with each node that is a mesh; nothing if no file has been loaded.
 	void ForEachMesh(const std::function<void(FbxNode&)>& i_rVisit, bool i_bTopOnly = false);
 
+	/// The same, with the progress; ends where that says so.
+	void ReadEachMesh(const std::function<void(FbxNode&)>& i_rRead);
+
 	float m_UnitScale = 1.0f;
 	float m_NodeScale = 1.0f;
 	int m_UpAxis = 0;
 	bool m_bComplete = false;
 	FBXMeshReader m_MeshReader;
 	std::shared_ptr<VSkinSkeleton> m_pSkeleton;
+	VProgress m_Progress;
 
 private:
-	bool Initialize(const std::string& i_rPath);
+	/// i_rInitialize makes the importer ready for what it is to read.
+	bool Load(const std::string& i_rPath, const std::function<bool()>& i_rInitialize);
+	void TellRefusal(const std::string& i_rPath);
 	void Import();
 	void ReadSettings();
 	bool ProcessSkeletonNode(FbxNode* i_pNode);
@@ -64,6 +72,29 @@ bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 		NVX_LOG("FBXIO", NVX::ELogError, "File %1% not found", i_rPath);
 		return false;
 	}
+	return Load(i_rPath,
+	    [&]
+	    {
+		    int format = -1;
+		    FbxIOPluginRegistry* const pRegistry = m_pManager->GetIOPluginRegistry();
+		    if (!pRegistry->DetectReaderFileFormat(i_rPath.c_str(), format))
+			    format = pRegistry->GetNativeReaderFormat();
+		    return m_pImporter->Initialize(i_rPath.c_str(), format, nullptr);
+	    });
+}
+
+bool FBXIO::FBXReader::VImpl::LoadMemory(std::string_view i_Bytes, const std::string& i_rPath)
+{
+	return Load(i_rPath,
+	    [&]
+	    {
+		    VMemoryStream stream(i_Bytes, m_pManager->GetIOPluginRegistry()->FindReaderIDByExtension("fbx"));
+		    return m_pImporter->Initialize(&stream, nullptr, -1, nullptr);
+	    });
+}
+
+bool FBXIO::FBXReader::VImpl::Load(const std::string& i_rPath, const std::function<bool()>& i_rInitialize)
+{
 	NVX_LOG("FBXIO", NVX::ELogInformation, "Loading file %1%", i_rPath);
 	m_MeshReader.SetPath(i_rPath);
 	m_pManager = FbxManager::Create();
@@ -71,8 +102,13 @@ bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 		return false;
 	m_pScene = FbxScene::Create(m_pManager, i_rPath.c_str());
 	m_pImporter = FbxImporter::Create(m_pManager, i_rPath.c_str());
-	if (!m_pScene || !m_pImporter || !Initialize(i_rPath))
+	if (!m_pScene || !m_pImporter)
 		return false;
+	if (!i_rInitialize())
+	{
+		TellRefusal(i_rPath);
+		return false;
+	}
 	Import();
 	ReadSettings();
 	ForEachNode(m_pScene->GetRootNode(), [this](FbxNode* i_pNode) { return ProcessSkeletonNode(i_pNode); });
@@ -81,15 +117,8 @@ bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 	return true;
 }
 
-bool FBXIO::FBXReader::VImpl::Initialize(const std::string& i_rPath)
+void FBXIO::FBXReader::VImpl::TellRefusal(const std::string& i_rPath)
 {
-	int format = -1;
-	FbxIOPluginRegistry* const pRegistry = m_pManager->GetIOPluginRegistry();
-	if (!pRegistry->DetectReaderFileFormat(i_rPath.c_str(), format))
-		format = pRegistry->GetNativeReaderFormat();
-	if (m_pImporter->Initialize(i_rPath.c_str(), format, nullptr))
-		return true;
-
 	NVX_LOG("FBXIO", NVX::ELogError, "Call to KFbxImporter::Initialize() failed.");
 	NVX_LOG("FBXIO", NVX::ELogError, "Error returned: %1%", m_pImporter->GetStatus().GetErrorString());
 	int major = 0, minor = 0, revision = 0;
@@ -101,11 +130,14 @@ bool FBXIO::FBXReader::VImpl::Initialize(const std::string& i_rPath)
 		    revision);
 		NVX_LOG("FBXIO", NVX::ELogError, "Current FBX version is %d.%d.%d\n", 2020, 0, 1);
 	}
-	return false;
 }
 
 void FBXIO::FBXReader::VImpl::Import()
 {
+	if (m_Progress)
+		m_pImporter->SetProgressCallback([](void* i_pProgress, float i_Percentage, const char*)
+		    { return (*static_cast<const VProgress*>(i_pProgress))(i_Percentage / 100.0f); },
+		    &m_Progress);
 	m_bComplete = m_pImporter->Import(m_pScene, false);
 	if (m_bComplete)
 		return;
@@ -173,6 +205,18 @@ void FBXIO::FBXReader::VImpl::ForEachMesh(const std::function<void(FbxNode&)>& i
 	    });
 }
 
+void FBXIO::FBXReader::VImpl::ReadEachMesh(const std::function<void(FbxNode&)>& i_rRead)
+{
+	std::vector<FbxNode*> meshes;
+	ForEachMesh([&meshes](FbxNode& i_rNode) { meshes.push_back(&i_rNode); });
+	for (std::size_t i = 0; i < meshes.size(); ++i)
+	{
+		if (m_Progress && !m_Progress(float(i) / float(meshes.size())))
+			return;
+		i_rRead(*meshes[i]);
+	}
+}
+
 bool FBXIO::FBXReader::VImpl::ProcessSkeletonNode(FbxNode* i_pNode)
 {
 	FbxSkeleton* const pAttribute = i_pNode->GetSkeleton();
@@ -195,12 +239,12 @@ bool FBXIO::FBXReader::VImpl::ProcessSkeletonNode(FbxNode* i_pNode)
 	CheckTransform(rBone.m_PreRotation, rBone.m_Name);
 
 	rBone.m_Local = SystemMatrix(i_pNode->EvaluateLocalTransform() * preRotation.Inverse());
-	CheckTransform(rBone.m_Local, rBone.m_Name);
 	ScaleTranslation(rBone.m_Local, m_UnitScale);
+	CheckTransform(rBone.m_Local, rBone.m_Name);
 
 	rBone.m_Global = SystemMatrix(i_pNode->EvaluateGlobalTransform());
-	CheckTransform(rBone.m_Global, rBone.m_Name);
 	ScaleTranslation(rBone.m_Global, m_UnitScale);
+	CheckTransform(rBone.m_Global, rBone.m_Name);
 	return false;
 }
 
@@ -211,6 +255,16 @@ FBXIO::FBXReader::~FBXReader() = default;
 bool FBXIO::FBXReader::LoadFile(const std::string& i_rPath)
 {
 	return m_pImpl->LoadFile(i_rPath);
+}
+
+bool FBXIO::FBXReader::LoadMemory(std::string_view i_Bytes, const std::string& i_rPath)
+{
+	return m_pImpl->LoadMemory(i_Bytes, i_rPath);
+}
+
+void FBXIO::FBXReader::SetProgress(VProgress i_Progress)
+{
+	m_pImpl->m_Progress = std::move(i_Progress);
 }
 
 bool FBXIO::FBXReader::IsComplete() const
@@ -241,7 +295,7 @@ std::shared_ptr<const FBXIO::VSkinSkeleton> FBXIO::FBXReader::GetSkeleton() cons
 void FBXIO::FBXReader::ReadPlacedMeshes(std::vector<VPlacedMesh>& o_rMeshes)
 {
 	o_rMeshes.clear();
-	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadPlacedMesh(i_rNode, o_rMeshes); });
+	m_pImpl->ReadEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadPlacedMesh(i_rNode, o_rMeshes); });
 }
 
 void FBXIO::FBXReader::ReadTopMesh(VBasicMesh& o_rMesh)
@@ -256,5 +310,5 @@ void FBXIO::FBXReader::ReadSkin(VSkin& o_rSkin)
 	std::set<std::int64_t> bones;
 	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.FindUsedBones(i_rNode, bones); });
 	o_rSkin.m_pSkeleton = m_pImpl->m_MeshReader.PruneSkeleton(std::move(bones));
-	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadSkinMesh(i_rNode, o_rSkin.m_Meshes); });
+	m_pImpl->ReadEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadSkinMesh(i_rNode, o_rSkin.m_Meshes); });
 }

@@ -2,8 +2,10 @@
 
 #include "FBXIO/Mesh.h"
 
+#include <functional>
 #include <memory>
 #include <string>
+#include <string_view>
 
 namespace FBXIO
 {
@@ -20,6 +22,15 @@ public:
 
 	/// The whole of the import; called once per reader. A file of which only a part could be read still gives true.
 	bool LoadFile(const std::string& i_rPath);
+
+	/// The same for the bytes of such a file. i_rPath stands for it in messages, and textures are looked for beside it.
+	bool LoadMemory(std::string_view i_Bytes, const std::string& i_rPath);
+
+	/// Called while a file is imported and before each mesh that is read, with how much of that is done, from 0 to 1;
+	/// what returns false ends it. A cancelled import leaves an empty scene and is told like one that failed; cancelled
+	/// meshes are left out.
+	using VProgress = std::function<bool(float)>;
+	void SetProgress(VProgress i_Progress);
 
 	/// False if the import broke off: what was read until then is there.
 	bool IsComplete() const;

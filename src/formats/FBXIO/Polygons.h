@@ -5,10 +5,26 @@
 
 #include <fbxsdk.h>
 
+#include <cmath>
 #include <cstring>
 
 namespace FBXIO
 {
+
+/// As a float; 0, with o_rbSound false, for what is no number or too large for one.
+inline float Finite(double i_Number, bool& o_rbSound)
+{
+	const float number = float(i_Number);
+	const bool bFinite = std::isfinite(number);
+	o_rbSound = o_rbSound && bFinite;
+	return bFinite ? number : 0.0f;
+}
+
+inline float Finite(double i_Number)
+{
+	bool bSound = true;
+	return Finite(i_Number, bSound);
+}
 
 /// Gives vertices their texture coordinates. Where these are given by polygon vertex the vertices become one for each
 /// coordinate; io_rIndices, the vertices of all polygons, follow.
@@ -24,25 +40,33 @@ void ApplyTexCoords(
 	if (mode != FbxLayerElement::eByControlPoint && mode != FbxLayerElement::eByPolygonVertex)
 		return;
 	const auto& rDirect = pUV->GetDirectArray();
-	const auto setCoordinate = [&rDirect](TVertex& o_rVertex, int i_Entry)
+	std::size_t missing = 0;
+	const auto setCoordinate = [&rDirect, &missing](TVertex& o_rVertex, int i_Entry)
 	{
 		const FbxVector2 coordinate = rDirect.GetAt(i_Entry);
-		o_rVertex.m_TexCoord = {float(coordinate[0]), float(coordinate[1])};
+		bool bSound = true;
+		o_rVertex.m_TexCoord = {Finite(coordinate[0], bSound), Finite(coordinate[1], bSound)};
+		missing += bSound ? 0 : 1;
 	};
+	const auto tellMissing = [&missing, i_pName]
+	{
+		if (missing > 0)
+			NVX_LOG("FBXIO", NVX::ELogWarning, "%1% vertices of mesh %2% have no texture coordinate", missing, i_pName);
+	};
+	const int entries = rDirect.GetCount();
 	if (mode == FbxLayerElement::eByControlPoint)
 	{
-		for (int i = 0; i < std::min(rDirect.GetCount(), int(io_rVertices.size())); ++i)
+		for (int i = 0; i < std::min(entries, int(io_rVertices.size())); ++i)
 			setCoordinate(io_rVertices[i], i);
+		tellMissing();
 		return;
 	}
 	const auto* const pIndex = pUV->GetReferenceMode() != FbxLayerElement::eDirect ? &pUV->GetIndexArray() : nullptr;
-	const int entries = rDirect.GetCount();
 	constexpr std::uint32_t c_None = 0xFFFFFFFFu;
-	std::vector<std::uint32_t> vertexOfEntry(rDirect.GetCount(), c_None);
+	std::vector<std::uint32_t> vertexOfEntry(entries, c_None);
 	std::vector<TVertex> vertices;
-	vertices.reserve(rDirect.GetCount());
+	vertices.reserve(entries);
 	std::size_t moved = 0;
-	std::size_t missing = 0;
 	for (int polygon = 0, count = io_rFrom.GetPolygonCount(); polygon < count; ++polygon)
 	{
 		const int start = io_rFrom.GetPolygonVertexIndex(polygon);
@@ -75,9 +99,7 @@ void ApplyTexCoords(
 		NVX_LOG("FBXIO", NVX::ELogWarning,
 		    "%1% polygon vertices of mesh %2% are moved to other control points that share their texture coordinate",
 		    moved, i_pName);
-	if (missing > 0)
-		NVX_LOG(
-		    "FBXIO", NVX::ELogWarning, "%1% polygon vertices of mesh %2% have no texture coordinate", missing, i_pName);
+	tellMissing();
 }
 
 /// Cuts polygons into fans of triangles, each for the part of its material.
@@ -91,11 +113,19 @@ void SplitIntoParts(FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndi
 	const FbxLayerElementArrayTemplate<int>* const pList =
 	    bMaterial ? &io_rFrom.GetElementMaterial()->GetIndexArray() : nullptr;
 	const bool bList = pList && pList->GetCount() == count;
-	const auto partOf = [&](int i_Polygon) { return bList ? std::size_t(std::max(pList->GetAt(i_Polygon), 0)) : 0u; };
+	/// Calls i_Visit(part, vertices, size) for each polygon that makes triangles.
+	const auto forEachPolygon = [&](auto&& i_Visit)
+	{
+		for (int polygon = 0; polygon < count; ++polygon)
+		{
+			const std::size_t part = bList ? std::size_t(std::max(pList->GetAt(polygon), 0)) : 0;
+			const int size = io_rFrom.GetPolygonSize(polygon);
+			if (part < io_rParts.size() && size >= 3)
+				i_Visit(part, i_rIndices.data() + io_rFrom.GetPolygonVertexIndex(polygon), size);
+		}
+	};
 	std::vector<std::size_t> triangles(io_rParts.size());
-	for (int polygon = 0; polygon < count; ++polygon)
-		if (partOf(polygon) < triangles.size())
-			triangles[partOf(polygon)] += std::max(io_rFrom.GetPolygonSize(polygon) - 2, 0);
+	forEachPolygon([&](std::size_t i_Part, const std::uint32_t*, int i_Size) { triangles[i_Part] += i_Size - 2; });
 	std::vector<std::uint8_t*> next(io_rParts.size());
 	for (std::size_t i = 0; i < io_rParts.size(); ++i)
 	{
@@ -103,19 +133,18 @@ void SplitIntoParts(FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndi
 		io_rParts[i].m_Indices.resize(triangles[i] * 3 * sizeof(TIndex));
 		next[i] = io_rParts[i].m_Indices.data();
 	}
-	for (int polygon = 0; polygon < count; ++polygon)
-	{
-		const std::size_t part = partOf(polygon);
-		if (part >= io_rParts.size())
-			continue;
-		const std::uint32_t* const p = i_rIndices.data() + io_rFrom.GetPolygonVertexIndex(polygon);
-		for (int i = 1, size = io_rFrom.GetPolygonSize(polygon); i + 1 < size; ++i)
-		{
-			const TIndex triangle[3]{TIndex(p[0]), TIndex(p[i]), TIndex(p[i + 1])};
-			std::memcpy(next[part], triangle, sizeof(triangle));
-			next[part] += sizeof(triangle);
-		}
-	}
+	forEachPolygon(
+	    [&](std::size_t i_Part, const std::uint32_t* i_pVertices, int i_Size)
+	    {
+		    std::uint8_t* pNext = next[i_Part];
+		    for (int i = 1; i + 1 < i_Size; ++i)
+		    {
+			    const TIndex triangle[3]{TIndex(i_pVertices[0]), TIndex(i_pVertices[i]), TIndex(i_pVertices[i + 1])};
+			    std::memcpy(pNext, triangle, sizeof(triangle));
+			    pNext += sizeof(triangle);
+		    }
+		    next[i_Part] = pNext;
+	    });
 }
 
 } // namespace FBXIO

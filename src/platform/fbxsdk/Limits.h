@@ -5,7 +5,7 @@
 
 /// What a file may ask of this machine. Files come from anywhere, so every size that a file claims is held against
 /// one of these, or against the bytes that back it, before memory is taken.
-namespace FbxFile::Limits
+namespace FbxFormat::Limits
 {
 
 /// Records inside records. Exporters use about ten; the limit keeps hostile nesting from costing anything.
@@ -34,4 +34,4 @@ inline constexpr std::uint64_t c_DeflateRatio = 1032;
 /// How far the text form is searched for its version before the file counts as something else.
 inline constexpr std::size_t c_TextHeaderBytes = 65536;
 
-} // namespace FbxFile::Limits
+} // namespace FbxFormat::Limits

@@ -13,5 +13,6 @@
 #include "fbxsdk/sdk/Node.h"
 #include "fbxsdk/sdk/Scene.h"
 #include "fbxsdk/sdk/Status.h"
+#include "fbxsdk/sdk/Stream.h"
 
 using namespace fbxsdk;

@@ -14,16 +14,7 @@
 namespace
 {
 
-using namespace FbxFile;
-
-bool Take(VDecodeBudget& io_rBudget, std::uint64_t i_Count, std::uint64_t i_ItemSize)
-{
-	const std::uint64_t bytes = i_Count * i_ItemSize;
-	if (bytes > io_rBudget.m_BytesLeft)
-		return false;
-	io_rBudget.m_BytesLeft -= bytes;
-	return true;
-}
+using namespace FbxFormat;
 
 /// Fills exactly i_Size bytes, or fails.
 bool Decode(const Binary::VArray& i_rArray, void* o_pBytes, std::size_t i_Size)
@@ -55,7 +46,7 @@ T Convert(TFile i_Number)
 }
 
 template <typename TFile, typename T>
-bool DecodeAs(const Binary::VArray& i_rArray, VDecodeBudget& io_rBudget, std::vector<T>& o_rNumbers)
+bool DecodeAs(const Binary::VArray& i_rArray, std::vector<T>& o_rNumbers)
 {
 	if constexpr (std::is_same_v<TFile, T>)
 	{
@@ -64,8 +55,6 @@ bool DecodeAs(const Binary::VArray& i_rArray, VDecodeBudget& io_rBudget, std::ve
 	}
 	else
 	{
-		if (!Take(io_rBudget, i_rArray.m_Count, sizeof(TFile)))
-			return false;
 		std::vector<TFile> numbers(i_rArray.m_Count);
 		if (!Decode(i_rArray, numbers.data(), numbers.size() * sizeof(TFile)))
 			return false;
@@ -76,17 +65,17 @@ bool DecodeAs(const Binary::VArray& i_rArray, VDecodeBudget& io_rBudget, std::ve
 }
 
 template <typename T>
-bool DecodeBinary(const Binary::VArray& i_rArray, VDecodeBudget& io_rBudget, std::vector<T>& o_rNumbers)
+bool DecodeBinary(const Binary::VArray& i_rArray, std::vector<T>& o_rNumbers)
 {
 	if (i_rArray.m_Count == 0)
 		return true;
 	switch (i_rArray.m_Type)
 	{
-	case 'f': return DecodeAs<float>(i_rArray, io_rBudget, o_rNumbers);
-	case 'd': return DecodeAs<double>(i_rArray, io_rBudget, o_rNumbers);
-	case 'i': return DecodeAs<std::int32_t>(i_rArray, io_rBudget, o_rNumbers);
-	case 'l': return DecodeAs<std::int64_t>(i_rArray, io_rBudget, o_rNumbers);
-	default: return DecodeAs<std::int8_t>(i_rArray, io_rBudget, o_rNumbers);
+	case 'f': return DecodeAs<float>(i_rArray, o_rNumbers);
+	case 'd': return DecodeAs<double>(i_rArray, o_rNumbers);
+	case 'i': return DecodeAs<std::int32_t>(i_rArray, o_rNumbers);
+	case 'l': return DecodeAs<std::int64_t>(i_rArray, o_rNumbers);
+	default: return DecodeAs<std::int8_t>(i_rArray, o_rNumbers);
 	}
 }
 
@@ -130,31 +119,52 @@ bool ReadList(const VElementTree& i_rTree, VElementIndex i_Element, std::vector<
 	return true;
 }
 
+/// The array that a record of the binary form holds; of no type if it holds none.
+Binary::VArray ArrayOf(const VElementTree& i_rTree, VElementIndex i_Element)
+{
+	const std::string_view values = i_rTree.Values(i_Element);
+	const bool bArray =
+	    i_rTree[i_Element].m_Form == EValueForm::Binary && !values.empty() && Binary::ArrayItemSize(values.front()) > 0;
+	return bArray ? Binary::LoadArray(values.data()) : Binary::VArray();
+}
+
+template <typename T>
+constexpr char c_TypeOf = std::is_same_v<T, float> ? 'f'
+    : std::is_same_v<T, double>                    ? 'd'
+    : std::is_same_v<T, std::int32_t>              ? 'i'
+                                                   : 'l';
+
 } // namespace
 
 template <typename T>
-bool FbxFile::ReadArray(
-    const VElementTree& i_rTree, VElementIndex i_Element, VDecodeBudget& io_rBudget, std::vector<T>& o_rNumbers)
+std::uint64_t FbxFormat::DecodedBytes(const VElementTree& i_rTree, VElementIndex i_Element)
+{
+	const Binary::VArray array = ArrayOf(i_rTree, i_Element);
+	if (array.m_Type == 0)
+		return i_rTree[i_Element].m_ValueCount * std::uint64_t(sizeof(T));
+	const std::uint64_t converted = array.m_Type == c_TypeOf<T> ? 0 : Binary::ArrayItemSize(array.m_Type);
+	return array.m_Count * (sizeof(T) + converted);
+}
+
+template <typename T>
+bool FbxFormat::ReadCharged(const VElementTree& i_rTree, VElementIndex i_Element, std::vector<T>& o_rNumbers)
 {
 	o_rNumbers.clear();
 	const VElement& rElement = i_rTree[i_Element];
-	const std::string_view values = i_rTree.Values(i_Element);
-	const bool bBinaryArray =
-	    rElement.m_Form == EValueForm::Binary && !values.empty() && Binary::ArrayItemSize(values.front()) > 0;
-	const Binary::VArray array = bBinaryArray ? Binary::LoadArray(values.data()) : Binary::VArray();
-	bool bSound = Take(io_rBudget, bBinaryArray ? array.m_Count : rElement.m_ValueCount, sizeof(T));
-	if (bSound && bBinaryArray)
-		bSound = DecodeBinary(array, io_rBudget, o_rNumbers);
-	else if (bSound && rElement.m_Form == EValueForm::TextArray)
-		bSound = ParseText(values, rElement.m_ValueCount, o_rNumbers);
-	else if (bSound)
-		bSound = ReadList(i_rTree, i_Element, o_rNumbers);
+	const Binary::VArray array = ArrayOf(i_rTree, i_Element);
+	const bool bSound = array.m_Type != 0 ? DecodeBinary(array, o_rNumbers)
+	    : rElement.m_Form == EValueForm::TextArray
+	    ? ParseText(i_rTree.Values(i_Element), rElement.m_ValueCount, o_rNumbers)
+	    : ReadList(i_rTree, i_Element, o_rNumbers);
 	if (!bSound)
 		o_rNumbers.clear();
 	return bSound;
 }
 
-template bool FbxFile::ReadArray(const VElementTree&, VElementIndex, VDecodeBudget&, std::vector<float>&);
-template bool FbxFile::ReadArray(const VElementTree&, VElementIndex, VDecodeBudget&, std::vector<double>&);
-template bool FbxFile::ReadArray(const VElementTree&, VElementIndex, VDecodeBudget&, std::vector<std::int32_t>&);
-template bool FbxFile::ReadArray(const VElementTree&, VElementIndex, VDecodeBudget&, std::vector<std::int64_t>&);
+#define RETARGET_ARRAYS_OF(T)                                                                                          \
+	template std::uint64_t FbxFormat::DecodedBytes<T>(const VElementTree&, VElementIndex);                             \
+	template bool FbxFormat::ReadCharged(const VElementTree&, VElementIndex, std::vector<T>&);
+RETARGET_ARRAYS_OF(float)
+RETARGET_ARRAYS_OF(double)
+RETARGET_ARRAYS_OF(std::int32_t)
+RETARGET_ARRAYS_OF(std::int64_t)

@@ -8,7 +8,7 @@
 namespace
 {
 
-using namespace FbxFile;
+using namespace FbxFormat;
 
 /// From this version on the three counts of a record's header have 64 bits.
 constexpr std::uint32_t c_FirstWideVersion = 7500;
@@ -47,7 +47,7 @@ bool AreValuesSound(std::string_view i_Values, std::uint64_t i_Count)
 
 } // namespace
 
-void FbxFile::ReadBinaryRecords(std::string_view i_Bytes, std::uint32_t i_Version, VTreeBuilder& io_rBuilder)
+void FbxFormat::ReadBinaryRecords(std::string_view i_Bytes, std::uint32_t i_Version, VTreeBuilder& io_rBuilder)
 {
 	const bool bWide = i_Version >= c_FirstWideVersion;
 	const std::size_t headerSize = bWide ? 25 : 13;

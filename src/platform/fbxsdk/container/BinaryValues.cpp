@@ -25,7 +25,7 @@ std::ptrdiff_t ScalarSize(char i_Type)
 
 } // namespace
 
-std::uint32_t FbxFile::Binary::ArrayItemSize(char i_Type)
+std::uint32_t FbxFormat::Binary::ArrayItemSize(char i_Type)
 {
 	switch (i_Type)
 	{
@@ -39,7 +39,7 @@ std::uint32_t FbxFile::Binary::ArrayItemSize(char i_Type)
 	}
 }
 
-const char* FbxFile::Binary::SkipValue(const char* i_pFrom, const char* i_pEnd)
+const char* FbxFormat::Binary::SkipValue(const char* i_pFrom, const char* i_pEnd)
 {
 	if (i_pFrom == i_pEnd)
 		return nullptr;
@@ -66,7 +66,7 @@ const char* FbxFile::Binary::SkipValue(const char* i_pFrom, const char* i_pEnd)
 	return array.m_pBytes + array.m_Size;
 }
 
-FbxFile::Binary::VArray FbxFile::Binary::LoadArray(const char* i_pFrom)
+FbxFormat::Binary::VArray FbxFormat::Binary::LoadArray(const char* i_pFrom)
 {
 	return {*i_pFrom, Load<std::uint32_t>(i_pFrom + 1), Load<std::uint32_t>(i_pFrom + 5) == 1,
 	    i_pFrom + c_ArrayHeaderSize, Load<std::uint32_t>(i_pFrom + 9)};

@@ -5,7 +5,7 @@
 #include <cstring>
 
 /// The values of the binary form: a byte for the type, then the value in little-endian bytes.
-namespace FbxFile::Binary
+namespace FbxFormat::Binary
 {
 
 static_assert(std::endian::native == std::endian::little, "values are read as they stand in the file");
@@ -38,4 +38,4 @@ const char* SkipValue(const char* i_pFrom, const char* i_pEnd);
 /// i_pFrom is the type of an array that SkipValue has found sound.
 VArray LoadArray(const char* i_pFrom);
 
-} // namespace FbxFile::Binary
+} // namespace FbxFormat::Binary

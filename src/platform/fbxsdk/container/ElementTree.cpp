@@ -4,7 +4,7 @@
 #include "fbxsdk/container/FileKind.h"
 #include "fbxsdk/container/TreeBuilder.h"
 
-bool FbxFile::VElementTree::Read(std::string_view i_Bytes, const VFileKind& i_rKind)
+bool FbxFormat::VElementTree::Read(std::string_view i_Bytes, const VFileKind& i_rKind)
 {
 	VTreeBuilder builder(*this, i_Bytes);
 	switch (i_rKind.m_Kind)
@@ -18,17 +18,17 @@ bool FbxFile::VElementTree::Read(std::string_view i_Bytes, const VFileKind& i_rK
 	return m_Error.empty();
 }
 
-std::string_view FbxFile::VElementTree::Name(VElementIndex i_Element) const
+std::string_view FbxFormat::VElementTree::Name(VElementIndex i_Element) const
 {
 	return m_Bytes.substr(m_Elements[i_Element].m_Name, m_Elements[i_Element].m_NameLength);
 }
 
-std::string_view FbxFile::VElementTree::Values(VElementIndex i_Element) const
+std::string_view FbxFormat::VElementTree::Values(VElementIndex i_Element) const
 {
 	return m_Bytes.substr(m_Elements[i_Element].m_Values, m_Elements[i_Element].m_ValuesSize);
 }
 
-FbxFile::VElementIndex FbxFile::VElementTree::Find(VElementIndex i_Parent, std::string_view i_Name) const
+FbxFormat::VElementIndex FbxFormat::VElementTree::Find(VElementIndex i_Parent, std::string_view i_Name) const
 {
 	for (const VElementIndex child : Children(i_Parent))
 		if (Name(child) == i_Name)
@@ -36,19 +36,19 @@ FbxFile::VElementIndex FbxFile::VElementTree::Find(VElementIndex i_Parent, std::
 	return c_NoElement;
 }
 
-FbxFile::VElementTree::VChildren FbxFile::VElementTree::Children(VElementIndex i_Parent) const
+FbxFormat::VElementTree::VChildren FbxFormat::VElementTree::Children(VElementIndex i_Parent) const
 {
 	const VElementIndex first = i_Parent == c_NoElement ? c_NoElement : m_Elements[i_Parent].m_FirstChild;
 	return {{*this, first}, {*this, c_NoElement}};
 }
 
-FbxFile::VTreeBuilder::VTreeBuilder(VElementTree& io_rTree, std::string_view i_Bytes) : m_rTree(io_rTree)
+FbxFormat::VTreeBuilder::VTreeBuilder(VElementTree& io_rTree, std::string_view i_Bytes) : m_rTree(io_rTree)
 {
 	m_rTree.m_Bytes = i_Bytes;
 	m_Open.push_back({VElementTree::c_Root, c_NoElement, i_Bytes.size()});
 }
 
-bool FbxFile::VTreeBuilder::Add(const VElement& i_rElement)
+bool FbxFormat::VTreeBuilder::Add(const VElement& i_rElement)
 {
 	if (m_rTree.m_Elements.size() >= Limits::c_Records)
 	{
@@ -66,7 +66,7 @@ bool FbxFile::VTreeBuilder::Add(const VElement& i_rElement)
 	return true;
 }
 
-bool FbxFile::VTreeBuilder::Open(std::size_t i_End)
+bool FbxFormat::VTreeBuilder::Open(std::size_t i_End)
 {
 	if (m_Open.size() > Limits::c_RecordDepth)
 	{
@@ -77,7 +77,7 @@ bool FbxFile::VTreeBuilder::Open(std::size_t i_End)
 	return true;
 }
 
-void FbxFile::VTreeBuilder::Error(std::string_view i_What, std::size_t i_Position)
+void FbxFormat::VTreeBuilder::Error(std::string_view i_What, std::size_t i_Position)
 {
 	if (m_rTree.m_Error.empty())
 		m_rTree.m_Error = std::string(i_What) + " (byte " + std::to_string(i_Position) + ")";

@@ -5,7 +5,7 @@
 #include <string_view>
 #include <vector>
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 struct VFileKind;
@@ -97,4 +97,4 @@ private:
 	std::string m_Error;
 };
 
-} // namespace FbxFile
+} // namespace FbxFormat

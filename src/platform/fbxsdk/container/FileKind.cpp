@@ -40,7 +40,7 @@ std::uint32_t VersionOfRecord(std::string_view i_Head)
 		return 0;
 	const char* p = i_Head.data() + at + key.size();
 	const char* const pEnd = i_Head.data() + i_Head.size();
-	p = FbxFile::Text::SkipBlanks(p, pEnd);
+	p = FbxFormat::Text::SkipBlanks(p, pEnd);
 	std::uint32_t version = 0;
 	std::from_chars(p, pEnd, version);
 	return version;
@@ -48,7 +48,7 @@ std::uint32_t VersionOfRecord(std::string_view i_Head)
 
 } // namespace
 
-FbxFile::VFileKind FbxFile::DetectFileKind(std::string_view i_Head)
+FbxFormat::VFileKind FbxFormat::DetectFileKind(std::string_view i_Head)
 {
 	i_Head = i_Head.substr(0, Limits::c_TextHeaderBytes);
 	if (i_Head.starts_with(c_Magic))

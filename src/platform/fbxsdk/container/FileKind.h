@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <string_view>
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 enum class EFileKind
@@ -33,4 +33,4 @@ inline constexpr std::uint32_t c_TooNewVersion = 8000;
 /// The length of the magic, the byte order and the version of a binary file: its records follow.
 inline constexpr std::size_t c_BinaryHeaderSize = 27;
 
-} // namespace FbxFile
+} // namespace FbxFormat

@@ -7,7 +7,7 @@
 namespace
 {
 
-using namespace FbxFile;
+using namespace FbxFormat;
 
 class VTextReader
 {
@@ -151,7 +151,7 @@ private:
 
 } // namespace
 
-void FbxFile::ReadTextRecords(std::string_view i_Bytes, VTreeBuilder& io_rBuilder)
+void FbxFormat::ReadTextRecords(std::string_view i_Bytes, VTreeBuilder& io_rBuilder)
 {
 	VTextReader(i_Bytes, io_rBuilder).Read();
 }

@@ -43,19 +43,19 @@ const char* Find(const char* i_pFrom, const char* i_pEnd, char i_Byte)
 
 } // namespace
 
-const char* FbxFile::Text::SkipByteOrderMark(const char* i_pFrom, const char* i_pEnd)
+const char* FbxFormat::Text::SkipByteOrderMark(const char* i_pFrom, const char* i_pEnd)
 {
 	return i_pEnd - i_pFrom >= 3 && std::memcmp(i_pFrom, "\xEF\xBB\xBF", 3) == 0 ? i_pFrom + 3 : i_pFrom;
 }
 
-const char* FbxFile::Text::SkipBlanks(const char* i_pFrom, const char* i_pEnd)
+const char* FbxFormat::Text::SkipBlanks(const char* i_pFrom, const char* i_pEnd)
 {
 	while (i_pFrom != i_pEnd && Is(*i_pFrom, EBlank))
 		++i_pFrom;
 	return i_pFrom;
 }
 
-const char* FbxFile::Text::SkipSpace(const char* i_pFrom, const char* i_pEnd)
+const char* FbxFormat::Text::SkipSpace(const char* i_pFrom, const char* i_pEnd)
 {
 	while (i_pFrom != i_pEnd)
 	{
@@ -69,21 +69,21 @@ const char* FbxFile::Text::SkipSpace(const char* i_pFrom, const char* i_pEnd)
 	return i_pFrom;
 }
 
-const char* FbxFile::Text::SkipLine(const char* i_pFrom, const char* i_pEnd)
+const char* FbxFormat::Text::SkipLine(const char* i_pFrom, const char* i_pEnd)
 {
 	while (i_pFrom != i_pEnd && *i_pFrom != '\n' && *i_pFrom != '\r')
 		++i_pFrom;
 	return i_pFrom;
 }
 
-const char* FbxFile::Text::ScanName(const char* i_pFrom, const char* i_pEnd)
+const char* FbxFormat::Text::ScanName(const char* i_pFrom, const char* i_pEnd)
 {
 	while (i_pFrom != i_pEnd && !Is(*i_pFrom, ENameEnd))
 		++i_pFrom;
 	return i_pFrom;
 }
 
-const char* FbxFile::Text::ScanValue(const char* i_pFrom, const char* i_pEnd)
+const char* FbxFormat::Text::ScanValue(const char* i_pFrom, const char* i_pEnd)
 {
 	if (i_pFrom != i_pEnd && *i_pFrom == '"')
 	{
@@ -95,7 +95,7 @@ const char* FbxFile::Text::ScanValue(const char* i_pFrom, const char* i_pEnd)
 	return i_pFrom;
 }
 
-const char* FbxFile::Text::NextValue(const char* i_pFrom, const char* i_pEnd)
+const char* FbxFormat::Text::NextValue(const char* i_pFrom, const char* i_pEnd)
 {
 	i_pFrom = SkipSpace(i_pFrom, i_pEnd);
 	if (i_pFrom == i_pEnd || *i_pFrom != ',')

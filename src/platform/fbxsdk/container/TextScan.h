@@ -4,7 +4,7 @@
 
 /// The tokens of the text form. All functions take the place to begin at and the end of the text, and return the
 /// place after what they took.
-namespace FbxFile::Text
+namespace FbxFormat::Text
 {
 
 const char* SkipByteOrderMark(const char* i_pFrom, const char* i_pEnd);
@@ -28,4 +28,4 @@ const char* ScanValue(const char* i_pFrom, const char* i_pEnd);
 /// may be broken into lines before and after a comma.
 const char* NextValue(const char* i_pFrom, const char* i_pEnd);
 
-} // namespace FbxFile::Text
+} // namespace FbxFormat::Text

@@ -2,7 +2,7 @@
 
 #include "fbxsdk/container/ElementTree.h"
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// What the two readers share: the records that are open, and the list of findings. No recursion: the depth of a file
@@ -42,4 +42,4 @@ private:
 void ReadBinaryRecords(std::string_view i_Bytes, std::uint32_t i_Version, VTreeBuilder& io_rBuilder);
 void ReadTextRecords(std::string_view i_Bytes, VTreeBuilder& io_rBuilder);
 
-} // namespace FbxFile
+} // namespace FbxFormat

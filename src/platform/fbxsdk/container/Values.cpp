@@ -11,7 +11,7 @@
 namespace
 {
 
-using namespace FbxFile;
+using namespace FbxFormat;
 
 VValue Integer(std::int64_t i_Value)
 {
@@ -65,12 +65,12 @@ VValue LoadText(std::string_view i_Text)
 
 } // namespace
 
-double FbxFile::VValue::AsReal(double i_Default) const
+double FbxFormat::VValue::AsReal(double i_Default) const
 {
 	return m_Kind == EValueKind::Real ? m_Real : m_Kind == EValueKind::Integer ? double(m_Integer) : i_Default;
 }
 
-std::int64_t FbxFile::VValue::AsInteger(std::int64_t i_Default) const
+std::int64_t FbxFormat::VValue::AsInteger(std::int64_t i_Default) const
 {
 	if (m_Kind == EValueKind::Integer)
 		return m_Integer;
@@ -78,7 +78,7 @@ std::int64_t FbxFile::VValue::AsInteger(std::int64_t i_Default) const
 	return m_Kind == EValueKind::Real && std::abs(m_Real) < 9e18 ? std::int64_t(m_Real) : i_Default;
 }
 
-FbxFile::VValue FbxFile::ParseNumber(std::string_view i_Text)
+FbxFormat::VValue FbxFormat::ParseNumber(std::string_view i_Text)
 {
 	std::int64_t integer = 0;
 	const char* const pEnd = i_Text.data() + i_Text.size();
@@ -95,13 +95,13 @@ FbxFile::VValue FbxFile::ParseNumber(std::string_view i_Text)
 	return TextValue(EValueKind::Word, i_Text);
 }
 
-FbxFile::VValueCursor::VValueCursor(const VElementTree& i_rTree, VElementIndex i_Element)
+FbxFormat::VValueCursor::VValueCursor(const VElementTree& i_rTree, VElementIndex i_Element)
     : m_p(i_rTree.Values(i_Element).data()), m_pEnd(m_p + i_rTree.Values(i_Element).size()),
       m_Form(i_rTree[i_Element].m_Form)
 {
 }
 
-FbxFile::VValue FbxFile::VValueCursor::Next()
+FbxFormat::VValue FbxFormat::VValueCursor::Next()
 {
 	if (m_p == m_pEnd)
 		return {};
@@ -123,7 +123,7 @@ FbxFile::VValue FbxFile::VValueCursor::Next()
 	return LoadText(text);
 }
 
-void FbxFile::VValueCursor::Skip(int i_Count)
+void FbxFormat::VValueCursor::Skip(int i_Count)
 {
 	for (; i_Count > 0 && m_p != m_pEnd; --i_Count)
 	{
@@ -134,7 +134,7 @@ void FbxFile::VValueCursor::Skip(int i_Count)
 	}
 }
 
-FbxFile::VValue FbxFile::ValueAt(const VElementTree& i_rTree, VElementIndex i_Element, int i_Place)
+FbxFormat::VValue FbxFormat::ValueAt(const VElementTree& i_rTree, VElementIndex i_Element, int i_Place)
 {
 	VValueCursor cursor(i_rTree, i_Element);
 	cursor.Skip(i_Place);

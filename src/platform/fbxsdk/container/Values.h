@@ -2,7 +2,7 @@
 
 #include "fbxsdk/container/ElementTree.h"
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 enum class EValueKind
@@ -55,4 +55,4 @@ VValue ValueAt(const VElementTree& i_rTree, VElementIndex i_Element, int i_Place
 /// A number of the text form, "1.#INF" and its kin included; kind Word if it is none.
 VValue ParseNumber(std::string_view i_Text);
 
-} // namespace FbxFile
+} // namespace FbxFormat

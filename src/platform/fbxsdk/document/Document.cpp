@@ -8,7 +8,7 @@
 namespace
 {
 
-using namespace FbxFile;
+using namespace FbxFormat;
 
 /// Of several objects with one key the first in the file is found.
 template <typename TKey>
@@ -20,7 +20,7 @@ VObjectIndex FindKey(const std::vector<std::pair<TKey, VObjectIndex>>& i_rSorted
 
 } // namespace
 
-FbxFile::VDocument::VDocument(const VElementTree& i_rTree) : m_rTree(i_rTree)
+FbxFormat::VDocument::VDocument(const VElementTree& i_rTree) : m_rTree(i_rTree)
 {
 	const VElementIndex first = m_rTree[VElementTree::c_Root].m_FirstChild;
 	m_bEscapes = first != c_NoElement && m_rTree[first].m_Form != EValueForm::Binary;
@@ -32,7 +32,7 @@ FbxFile::VDocument::VDocument(const VElementTree& i_rTree) : m_rTree(i_rTree)
 	ReadConnections();
 }
 
-void FbxFile::VDocument::ReadObjects()
+void FbxFormat::VDocument::ReadObjects()
 {
 	for (const VElementIndex section : m_rTree.Children(VElementTree::c_Root))
 	{
@@ -65,7 +65,7 @@ void FbxFile::VDocument::ReadObjects()
 	std::sort(m_ByName.begin(), m_ByName.end());
 }
 
-FbxFile::VObjectIndex FbxFile::VDocument::FindObject(const VValue& i_rKey) const
+FbxFormat::VObjectIndex FbxFormat::VDocument::FindObject(const VValue& i_rKey) const
 {
 	if (i_rKey.m_Kind == EValueKind::Integer)
 		return i_rKey.m_Integer == 0 ? c_SceneObject : FindKey(m_ByNumber, i_rKey.m_Integer);
@@ -75,7 +75,7 @@ FbxFile::VObjectIndex FbxFile::VDocument::FindObject(const VValue& i_rKey) const
 	return name.m_Name == "Scene" && name.m_Class == "Model" ? c_SceneObject : FindKey(m_ByName, i_rKey.m_Text);
 }
 
-void FbxFile::VDocument::ReadConnections()
+void FbxFormat::VDocument::ReadConnections()
 {
 	for (const VElementIndex section : m_rTree.Children(VElementTree::c_Root))
 	{
@@ -99,7 +99,7 @@ void FbxFile::VDocument::ReadConnections()
 	}
 }
 
-FbxFile::VElementIndex FbxFile::VDocument::GlobalSettings() const
+FbxFormat::VElementIndex FbxFormat::VDocument::GlobalSettings() const
 {
 	const VElementIndex section = m_rTree.Find(VElementTree::c_Root, "GlobalSettings");
 	if (section != c_NoElement)
@@ -108,7 +108,7 @@ FbxFile::VElementIndex FbxFile::VDocument::GlobalSettings() const
 	return m_rTree.Find(m_rTree.Find(VElementTree::c_Root, "Objects"), "GlobalSettings");
 }
 
-FbxFile::VElementIndex FbxFile::VDocument::Template(std::string_view i_Kind) const
+FbxFormat::VElementIndex FbxFormat::VDocument::Template(std::string_view i_Kind) const
 {
 	for (const VElementIndex type : m_rTree.Children(m_rTree.Find(VElementTree::c_Root, "Definitions")))
 		if (m_rTree.Name(type) == "ObjectType" && ValueAt(m_rTree, type, 0).m_Text == i_Kind)

@@ -8,7 +8,7 @@
 #include <utility>
 #include <vector>
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// Position of an object in its document.
@@ -79,4 +79,4 @@ private:
 	std::vector<std::pair<std::string_view, VObjectIndex>> m_ByName;
 };
 
-} // namespace FbxFile
+} // namespace FbxFormat

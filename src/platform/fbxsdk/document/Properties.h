@@ -3,7 +3,7 @@
 #include "fbxsdk/container/ElementTree.h"
 #include "fbxsdk/container/Values.h"
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// Calls i_Visit(name, cursor at the first value) for each property of an object, of a template or of the global
@@ -27,4 +27,4 @@ void VisitProperties(const VElementTree& i_rTree, VElementIndex i_Object, TVisit
 	}
 }
 
-} // namespace FbxFile
+} // namespace FbxFormat

@@ -65,7 +65,7 @@ std::string Unescape(std::string_view i_Text)
 
 } // namespace
 
-FbxFile::VFullName FbxFile::SplitFullName(std::string_view i_FullName)
+FbxFormat::VFullName FbxFormat::SplitFullName(std::string_view i_FullName)
 {
 	if (const std::size_t at = i_FullName.find("\0\1"sv); at != std::string_view::npos)
 		return {i_FullName.substr(0, at), i_FullName.substr(at + 2)};
@@ -74,7 +74,7 @@ FbxFile::VFullName FbxFile::SplitFullName(std::string_view i_FullName)
 	return {i_FullName, {}};
 }
 
-std::string FbxFile::DecodeText(std::string_view i_Text, bool i_bEscaped)
+std::string FbxFormat::DecodeText(std::string_view i_Text, bool i_bEscaped)
 {
 	std::string text = i_bEscaped ? Unescape(i_Text) : std::string(i_Text);
 	if (IsUtf8(text))

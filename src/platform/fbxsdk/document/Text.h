@@ -3,7 +3,7 @@
 #include <string>
 #include <string_view>
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// An object's full name as it stands in a file, taken apart. The text form writes "Class::Name", the binary form
@@ -20,4 +20,4 @@ VFullName SplitFullName(std::string_view i_FullName);
 /// that is no UTF-8, as old exporters write it, is taken as Latin-1, so that every byte is kept as a character.
 std::string DecodeText(std::string_view i_Text, bool i_bEscaped);
 
-} // namespace FbxFile
+} // namespace FbxFormat

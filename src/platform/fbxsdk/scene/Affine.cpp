@@ -26,7 +26,7 @@ VMatrix3 AxisRotation(int i_Axis, double i_Degrees)
 
 } // namespace
 
-FbxFile::VAffine FbxFile::Product(const VAffine& i_rA, const VAffine& i_rB)
+FbxFormat::VAffine FbxFormat::Product(const VAffine& i_rA, const VAffine& i_rB)
 {
 	VVector3 t = Rotation::Product(i_rA.L, i_rB.t);
 	for (int i = 0; i < 3; ++i)
@@ -34,7 +34,7 @@ FbxFile::VAffine FbxFile::Product(const VAffine& i_rA, const VAffine& i_rB)
 	return {Rotation::Product(i_rA.L, i_rB.L), t};
 }
 
-FbxFile::VAffine FbxFile::Inverse(const VAffine& i_rMap)
+FbxFormat::VAffine FbxFormat::Inverse(const VAffine& i_rMap)
 {
 	const VMatrix3& m = i_rMap.L;
 	const double determinant = Determinant(m);
@@ -50,7 +50,7 @@ FbxFile::VAffine FbxFile::Inverse(const VAffine& i_rMap)
 	return {inverse, {-t[0], -t[1], -t[2]}};
 }
 
-FbxFile::VAffine FbxFile::Load(const fbxsdk::FbxAMatrix& i_rMatrix)
+FbxFormat::VAffine FbxFormat::Load(const fbxsdk::FbxAMatrix& i_rMatrix)
 {
 	VAffine map;
 	for (int row = 0; row < 3; ++row)
@@ -62,7 +62,7 @@ FbxFile::VAffine FbxFile::Load(const fbxsdk::FbxAMatrix& i_rMatrix)
 	return map;
 }
 
-void FbxFile::Store(const VAffine& i_rMap, fbxsdk::FbxAMatrix& o_rMatrix)
+void FbxFormat::Store(const VAffine& i_rMap, fbxsdk::FbxAMatrix& o_rMatrix)
 {
 	for (int row = 0; row < 3; ++row)
 	{
@@ -74,7 +74,7 @@ void FbxFile::Store(const VAffine& i_rMap, fbxsdk::FbxAMatrix& o_rMatrix)
 	o_rMatrix[3][3] = 1.0;
 }
 
-Rotation::VMatrix3 FbxFile::ScaledColumns(const VMatrix3& i_rMatrix, const VVector3& i_rScaling)
+Rotation::VMatrix3 FbxFormat::ScaledColumns(const VMatrix3& i_rMatrix, const VVector3& i_rScaling)
 {
 	VMatrix3 scaled = i_rMatrix;
 	for (int i = 0; i < 9; ++i)
@@ -82,7 +82,7 @@ Rotation::VMatrix3 FbxFile::ScaledColumns(const VMatrix3& i_rMatrix, const VVect
 	return scaled;
 }
 
-Rotation::VMatrix3 FbxFile::EulerRotation(const VVector3& i_rDegrees, ERotationOrder i_Order)
+Rotation::VMatrix3 FbxFormat::EulerRotation(const VVector3& i_rDegrees, ERotationOrder i_Order)
 {
 	static constexpr int c_Axes[6][3] = {{0, 1, 2}, {0, 2, 1}, {1, 2, 0}, {1, 0, 2}, {2, 0, 1}, {2, 1, 0}};
 	VMatrix3 rotation = c_Identity3;

@@ -3,7 +3,7 @@
 #include "fbxsdk/sdk/AffineMatrix.h"
 #include "numerics/Rotation.h"
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// x -> L x + t, for column vectors.
@@ -39,4 +39,4 @@ enum class ERotationOrder
 /// Turns about the fixed axes, in degrees: order XYZ turns about x first, and is Rz Ry Rx.
 Rotation::VMatrix3 EulerRotation(const Rotation::VVector3& i_rDegrees, ERotationOrder i_Order);
 
-} // namespace FbxFile
+} // namespace FbxFormat

@@ -2,18 +2,73 @@
 
 #include "DebugServices/GlobalLog.h"
 
-template <typename T>
-bool FbxFile::Decode(const VArraySource& i_rSource, const char* i_pOwner, std::vector<T>& o_rNumbers)
+#include <atomic>
+#include <system_error>
+#include <thread>
+
+namespace
 {
-	o_rNumbers.clear();
-	if (i_rSource.m_Element == c_NoElement)
-		return true;
-	if (ReadArray(*i_rSource.m_pTree, i_rSource.m_Element, *i_rSource.m_pBudget, o_rNumbers))
-		return true;
-	NVX_LOG("FBXIO", NVX::ELogWarning, "Array %1% of %2% left out because it is damaged or too large",
-	    i_rSource.m_pTree->Name(i_rSource.m_Element), i_pOwner);
-	return false;
+
+using namespace FbxFormat;
+
+/// Below this many bytes in the file a second thread costs more than it gains.
+constexpr std::size_t c_BytesForTwo = 100'000;
+
+std::uint64_t CostOf(const VDecodeJob& i_rJob)
+{
+	return std::visit([&]<typename T>(const std::vector<T>*)
+	    { return DecodedBytes<T>(*i_rJob.m_Source.m_pTree, i_rJob.m_Source.m_Element); },
+	    i_rJob.m_pNumbers);
 }
 
-template bool FbxFile::Decode(const VArraySource&, const char*, std::vector<double>&);
-template bool FbxFile::Decode(const VArraySource&, const char*, std::vector<std::int32_t>&);
+void Run(VDecodeJob& io_rJob)
+{
+	io_rJob.m_bSound = std::visit([&](auto* o_pNumbers)
+	    { return ReadCharged(*io_rJob.m_Source.m_pTree, io_rJob.m_Source.m_Element, *o_pNumbers); },
+	    io_rJob.m_pNumbers);
+}
+
+} // namespace
+
+void FbxFormat::Decode(std::span<VDecodeJob> io_Jobs)
+{
+	std::vector<VDecodeJob*> jobs;
+	std::size_t bytes = 0;
+	for (VDecodeJob& rJob : io_Jobs)
+	{
+		std::visit([](auto* o_pNumbers) { o_pNumbers->clear(); }, rJob.m_pNumbers);
+		if (rJob.m_Source.m_Element == c_NoElement)
+			continue;
+		// Charged before any thread runs: what is left out does not depend on which is faster.
+		rJob.m_bSound = rJob.m_Source.m_pBudget->Take(CostOf(rJob));
+		if (!rJob.m_bSound)
+			continue;
+		jobs.push_back(&rJob);
+		bytes += rJob.m_Source.m_pTree->Values(rJob.m_Source.m_Element).size();
+	}
+
+	std::atomic<std::size_t> next = 0;
+	const auto run = [&]
+	{
+		for (std::size_t i = next++; i < jobs.size(); i = next++)
+			Run(*jobs[i]);
+	};
+	std::thread second;
+	if (jobs.size() > 1 && bytes >= c_BytesForTwo)
+		try
+		{
+			second = std::thread(run);
+		}
+		catch (const std::system_error&)
+		{
+			// The system has no thread to give: one does it all.
+		}
+	run();
+	if (second.joinable())
+		second.join();
+
+	for (const VDecodeJob& rJob : io_Jobs)
+		if (!rJob.m_bSound)
+			NVX_LOG("FBXIO", NVX::ELogWarning, "Array %1% of %2% left out because it is damaged or too large",
+			    rJob.m_Source.m_pTree->Name(rJob.m_Source.m_Element), rJob.m_pOwner);
+}

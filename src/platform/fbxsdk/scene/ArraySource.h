@@ -2,9 +2,11 @@
 
 #include "fbxsdk/container/Arrays.h"
 
+#include <span>
 #include <string>
+#include <variant>
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// Where an array of a scene's object stands in the file: it is decoded when somebody asks for it. Tree and budget are
@@ -20,9 +22,25 @@ struct VArraySource
 	VArraySource Child(std::string_view i_Name) const { return {m_pTree, m_pBudget, m_pTree->Find(m_Element, i_Name)}; }
 };
 
-/// All numbers of the array, straight into o_rNumbers; none if the file has no such array. T is double or std::int32_t.
-/// @return false, with none, if they are damaged: told in the log category "FBXIO" with the owner's name.
-template <typename T>
-bool Decode(const VArraySource& i_rSource, const char* i_pOwner, std::vector<T>& o_rNumbers);
+/// An array that is to be decoded straight to where it stays.
+struct VDecodeJob
+{
+	VArraySource m_Source;
+	/// For messages.
+	const char* m_pOwner = "";
+	std::variant<std::vector<double>*, std::vector<std::int32_t>*> m_pNumbers;
+	/// False, with no numbers, if the array is damaged or beyond the budget. One that the file does not have is sound.
+	bool m_bSound = true;
+};
 
-} // namespace FbxFile
+/// Decodes them all, on two threads where that pays. What is not sound is told in the log category "FBXIO" with its
+/// owner. Results and messages are as if it were done in their order.
+void Decode(std::span<VDecodeJob> io_Jobs);
+
+inline bool Decode(VDecodeJob i_Job)
+{
+	Decode(std::span(&i_Job, 1));
+	return i_Job.m_bSound;
+}
+
+} // namespace FbxFormat

@@ -7,7 +7,7 @@
 namespace
 {
 
-using namespace FbxFile;
+using namespace FbxFormat;
 using namespace fbxsdk;
 
 using VColor = FbxPropertyT<FbxDouble3>;
@@ -80,12 +80,12 @@ bool EqualInAnyCase(std::string_view i_Text, std::string_view i_Lower)
 
 } // namespace
 
-FbxFile::VMaterialReader::VMaterialReader(const VDocument& i_rDocument)
+FbxFormat::VMaterialReader::VMaterialReader(const VDocument& i_rDocument)
     : m_rDocument(i_rDocument), m_Template(i_rDocument.Template("Material"))
 {
 }
 
-std::string_view FbxFile::VMaterialReader::ShadingModel(const VObject& i_rObject) const
+std::string_view FbxFormat::VMaterialReader::ShadingModel(const VObject& i_rObject) const
 {
 	const VElementTree& rTree = m_rDocument.Tree();
 	std::string_view model;
@@ -103,7 +103,7 @@ std::string_view FbxFile::VMaterialReader::ShadingModel(const VObject& i_rObject
 	return model;
 }
 
-std::unique_ptr<fbxsdk::FbxSurfaceMaterial> FbxFile::VMaterialReader::ReadMaterial(const VObject& i_rObject) const
+std::unique_ptr<fbxsdk::FbxSurfaceMaterial> FbxFormat::VMaterialReader::ReadMaterial(const VObject& i_rObject) const
 {
 	const std::string_view model = ShadingModel(i_rObject);
 	std::string name = m_rDocument.Decoded(i_rObject.m_Name);
@@ -119,7 +119,7 @@ std::unique_ptr<fbxsdk::FbxSurfaceMaterial> FbxFile::VMaterialReader::ReadMateri
 	return pMaterial;
 }
 
-void FbxFile::VMaterialReader::ReadValues(VElementIndex i_Properties, FbxSurfaceLambert& io_rMaterial) const
+void FbxFormat::VMaterialReader::ReadValues(VElementIndex i_Properties, FbxSurfaceLambert& io_rMaterial) const
 {
 	// The other names first, so that the SDK's name wins wherever it stands.
 	for (const bool bOtherName : {true, false})
@@ -135,7 +135,7 @@ void FbxFile::VMaterialReader::ReadValues(VElementIndex i_Properties, FbxSurface
 		    });
 }
 
-std::unique_ptr<fbxsdk::FbxFileTexture> FbxFile::VMaterialReader::ReadTexture(const VObject& i_rObject) const
+std::unique_ptr<fbxsdk::FbxFileTexture> FbxFormat::VMaterialReader::ReadTexture(const VObject& i_rObject) const
 {
 	const VElementTree& rTree = m_rDocument.Tree();
 	const auto text = [&](const char* i_pName) -> std::string
@@ -147,7 +147,7 @@ std::unique_ptr<fbxsdk::FbxFileTexture> FbxFile::VMaterialReader::ReadTexture(co
 	    new FbxFileTexture(m_rDocument.Decoded(i_rObject.m_Name), text("FileName"), text("RelativeFilename")));
 }
 
-void FbxFile::VMaterialReader::Connect(
+void FbxFormat::VMaterialReader::Connect(
     FbxFileTexture& i_rTexture, FbxSurfaceMaterial& io_rMaterial, std::string_view i_Property)
 {
 	auto* const pMaterial = FbxCast<FbxSurfaceLambert>(&io_rMaterial);

@@ -5,7 +5,7 @@
 
 #include <memory>
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// Makes materials and textures of their records. Of a material's value the first of these counts that the file has:
@@ -30,4 +30,4 @@ private:
 	VElementIndex m_Template;
 };
 
-} // namespace FbxFile
+} // namespace FbxFormat

@@ -5,20 +5,20 @@ using namespace Rotation;
 namespace
 {
 
-VMatrix3 LocalRotation(const FbxFile::VNodeTransform& i_rNode)
+VMatrix3 LocalRotation(const FbxFormat::VNodeTransform& i_rNode)
 {
-	using FbxFile::ERotationOrder;
+	using FbxFormat::ERotationOrder;
 	if (!i_rNode.m_bRotationActive)
-		return FbxFile::EulerRotation(i_rNode.m_Rotation, ERotationOrder::XYZ);
-	const VMatrix3 pre = FbxFile::EulerRotation(i_rNode.m_PreRotation, ERotationOrder::XYZ);
-	const VMatrix3 post = FbxFile::EulerRotation(i_rNode.m_PostRotation, ERotationOrder::XYZ);
-	const VMatrix3 rotation = FbxFile::EulerRotation(i_rNode.m_Rotation, i_rNode.m_Order);
+		return FbxFormat::EulerRotation(i_rNode.m_Rotation, ERotationOrder::XYZ);
+	const VMatrix3 pre = FbxFormat::EulerRotation(i_rNode.m_PreRotation, ERotationOrder::XYZ);
+	const VMatrix3 post = FbxFormat::EulerRotation(i_rNode.m_PostRotation, ERotationOrder::XYZ);
+	const VMatrix3 rotation = FbxFormat::EulerRotation(i_rNode.m_Rotation, i_rNode.m_Order);
 	return Rotation::Product(pre, Rotation::Product(rotation, Transposed(post)));
 }
 
 } // namespace
 
-FbxFile::VLocalTransform FbxFile::LocalTransform(const VNodeTransform& i_rNode)
+FbxFormat::VLocalTransform FbxFormat::LocalTransform(const VNodeTransform& i_rNode)
 {
 	VLocalTransform local;
 	local.m_Rotation = LocalRotation(i_rNode);
@@ -34,7 +34,7 @@ FbxFile::VLocalTransform FbxFile::LocalTransform(const VNodeTransform& i_rNode)
 	return local;
 }
 
-FbxFile::VGlobalTransform FbxFile::GlobalTransform(
+FbxFormat::VGlobalTransform FbxFormat::GlobalTransform(
     const VGlobalTransform& i_rParent, const VLocalTransform& i_rLocal, EInheritType i_InheritType)
 {
 	VGlobalTransform global;

@@ -2,7 +2,7 @@
 
 #include "fbxsdk/scene/Affine.h"
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// How the rotation R and scaling S of a node combine with its parent's: the letters of a type stand in the order in
@@ -58,4 +58,4 @@ struct VGlobalTransform
 VGlobalTransform GlobalTransform(
     const VGlobalTransform& i_rParent, const VLocalTransform& i_rLocal, EInheritType i_InheritType);
 
-} // namespace FbxFile
+} // namespace FbxFormat

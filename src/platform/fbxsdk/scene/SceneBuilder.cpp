@@ -15,7 +15,7 @@
 namespace
 {
 
-using namespace FbxFile;
+using namespace FbxFormat;
 
 /// The first version in which what a node is stands in an object of its own.
 constexpr std::uint32_t c_FirstVersionWithAttributes = 7000;
@@ -83,7 +83,8 @@ bool IsEncrypted(const VElementTree& i_rTree)
 
 } // namespace
 
-FbxFile::VImportResult FbxFile::VSceneBuilder::Build(VFileBytes i_Bytes, const VFileKind& i_rKind)
+FbxFormat::VImportResult FbxFormat::VSceneBuilder::Build(
+    VFileBytes i_Bytes, const VFileKind& i_rKind, VProgress& io_rProgress)
 {
 	BuildEmpty();
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
@@ -95,11 +96,15 @@ FbxFile::VImportResult FbxFile::VSceneBuilder::Build(VFileBytes i_Bytes, const V
 		result.m_bEncrypted = true;
 		return result;
 	}
+	if (!io_rProgress.Tell(90.0f, "Building the scene"))
+		return result;
 	rContent.m_pDocument = std::make_unique<VDocument>(rContent.m_Tree);
 	BuildSettings();
 	const bool bAll = BuildObjects(i_rKind.m_Version);
 	Connect();
 	TellUnreached();
+	if (!io_rProgress.Tell(100.0f, "Building the scene"))
+		BuildEmpty();
 	for (const std::string& rError : {rContent.m_Tree.Error(), rContent.m_pDocument->Error(),
 	         std::string(bAll ? "" : "it has more nodes, or parts of nodes, than are read")})
 		if (result.m_Error.empty())
@@ -107,14 +112,14 @@ FbxFile::VImportResult FbxFile::VSceneBuilder::Build(VFileBytes i_Bytes, const V
 	return result;
 }
 
-void FbxFile::VSceneBuilder::BuildEmpty()
+void FbxFormat::VSceneBuilder::BuildEmpty()
 {
 	m_rScene.m_pContent = std::make_unique<fbxsdk::FbxScene::VContent>();
 	m_rScene.m_GlobalSettings = {};
 	m_rScene.m_pContent->m_Nodes.emplace_back(new fbxsdk::FbxNode("RootNode"));
 }
 
-void FbxFile::VSceneBuilder::BuildSettings()
+void FbxFormat::VSceneBuilder::BuildSettings()
 {
 	const VDocument& rDocument = *m_rScene.m_pContent->m_pDocument;
 	fbxsdk::FbxGlobalSettings& rSettings = m_rScene.m_GlobalSettings;
@@ -122,7 +127,14 @@ void FbxFile::VSceneBuilder::BuildSettings()
 	    [&rSettings](std::string_view i_Name, VValueCursor& io_rCursor)
 	    {
 		    if (i_Name == "UnitScaleFactor")
-			    rSettings.m_UnitScaleFactor = io_rCursor.Next().AsReal(rSettings.m_UnitScaleFactor);
+		    {
+			    const double factor = io_rCursor.Next().AsReal(rSettings.m_UnitScaleFactor);
+			    // Ten times it must be a float, and not 0.
+			    if (factor > 1e-30 && factor < 1e30)
+				    rSettings.m_UnitScaleFactor = factor;
+			    else
+				    NVX_LOG("FBXIO", NVX::ELogWarning, "Unit of %1% centimetres is none; taking centimetres", factor);
+		    }
 		    else if (i_Name == "UpAxisSign")
 			    rSettings.m_UpSign = io_rCursor.Next().AsInteger(1) < 0 ? -1 : 1;
 		    else if (i_Name == "UpAxis")
@@ -135,13 +147,13 @@ void FbxFile::VSceneBuilder::BuildSettings()
 }
 
 template <typename T>
-T* FbxFile::VSceneBuilder::AddPart(T* i_pPart)
+T* FbxFormat::VSceneBuilder::AddPart(T* i_pPart)
 {
 	m_rScene.m_pContent->m_Parts.emplace_back(i_pPart);
 	return i_pPart;
 }
 
-FbxFile::VSceneBuilder::VBuilt FbxFile::VSceneBuilder::BuildPart(
+FbxFormat::VSceneBuilder::VBuilt FbxFormat::VSceneBuilder::BuildPart(
     const VObject& i_rObject, const VMaterialReader& i_rMaterials)
 {
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
@@ -165,7 +177,7 @@ FbxFile::VSceneBuilder::VBuilt FbxFile::VSceneBuilder::BuildPart(
 	return {};
 }
 
-bool FbxFile::VSceneBuilder::BuildObjects(std::uint32_t i_Version)
+bool FbxFormat::VSceneBuilder::BuildObjects(std::uint32_t i_Version)
 {
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
 	const VDocument& rDocument = *rContent.m_pDocument;
@@ -205,7 +217,7 @@ bool FbxFile::VSceneBuilder::BuildObjects(std::uint32_t i_Version)
 	return true;
 }
 
-void FbxFile::VSceneBuilder::Connect()
+void FbxFormat::VSceneBuilder::Connect()
 {
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
 	const VBuilt root = rContent.m_Nodes.front().get();
@@ -234,7 +246,7 @@ void FbxFile::VSceneBuilder::Connect()
 		    m_pSecondParent->GetName());
 }
 
-void FbxFile::VSceneBuilder::ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::FbxNode& io_rParent)
+void FbxFormat::VSceneBuilder::ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::FbxNode& io_rParent)
 {
 	if (!io_rChild.m_pData->m_pParent)
 	{
@@ -248,7 +260,8 @@ void FbxFile::VSceneBuilder::ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::Fb
 	}
 }
 
-void FbxFile::VSceneBuilder::ConnectParts(const VBuilt& i_rChild, const VBuilt& i_rParent, std::string_view i_Property)
+void FbxFormat::VSceneBuilder::ConnectParts(
+    const VBuilt& i_rChild, const VBuilt& i_rParent, std::string_view i_Property)
 {
 	using namespace fbxsdk;
 	const auto child = [&]<typename T>(T*)
@@ -284,12 +297,16 @@ void FbxFile::VSceneBuilder::ConnectParts(const VBuilt& i_rChild, const VBuilt& 
 	else if (child(c_pSkin) && parent(c_pMesh))
 		parent(c_pMesh)->m_Skins.push_back(child(c_pSkin));
 	else if (child(c_pCluster) && parent(c_pSkin))
+	{
 		parent(c_pSkin)->m_Clusters.push_back(child(c_pCluster));
+		if (!child(c_pCluster)->m_pSkin)
+			child(c_pCluster)->m_pSkin = parent(c_pSkin);
+	}
 	else if (child(c_pNode) && parent(c_pCluster) && !parent(c_pCluster)->m_pLink)
 		parent(c_pCluster)->m_pLink = child(c_pNode);
 }
 
-void FbxFile::VSceneBuilder::TellUnreached()
+void FbxFormat::VSceneBuilder::TellUnreached()
 {
 	const auto& rNodes = m_rScene.m_pContent->m_Nodes;
 	// Every node has one parent at most, so nothing below a node without parent can be in a ring.

@@ -19,7 +19,7 @@ class FbxSkin;
 class FbxSurfaceMaterial;
 } // namespace fbxsdk
 
-namespace FbxFile
+namespace FbxFormat
 {
 
 /// How far an import got.
@@ -38,7 +38,8 @@ class VSceneBuilder
 public:
 	explicit VSceneBuilder(fbxsdk::FbxScene& io_rScene) : m_rScene(io_rScene) {}
 
-	VImportResult Build(VFileBytes i_Bytes, const VFileKind& i_rKind);
+	/// Nothing is in the scene but its root if the progress is cancelled.
+	VImportResult Build(VFileBytes i_Bytes, const VFileKind& i_rKind, VProgress& io_rProgress);
 
 	/// A scene with nothing but its root.
 	void BuildEmpty();
@@ -75,4 +76,4 @@ private:
 	std::size_t m_SecondParents = 0;
 };
 
-} // namespace FbxFile
+} // namespace FbxFormat

@@ -2,18 +2,18 @@
 
 #include "fbxsdk/scene/Affine.h"
 
-using FbxFile::VAffine;
+using FbxFormat::VAffine;
 
 fbxsdk::FbxAMatrix::FbxAMatrix(const FbxVector4& pT, const FbxVector4& pR, const FbxVector4& pS)
 {
 	const Rotation::VVector3 scaling{pS[0], pS[1], pS[2]};
-	const Rotation::VMatrix3 rotation = FbxFile::EulerRotation({pR[0], pR[1], pR[2]}, FbxFile::ERotationOrder::XYZ);
-	FbxFile::Store({FbxFile::ScaledColumns(rotation, scaling), {pT[0], pT[1], pT[2]}}, *this);
+	const Rotation::VMatrix3 rotation = FbxFormat::EulerRotation({pR[0], pR[1], pR[2]}, FbxFormat::ERotationOrder::XYZ);
+	FbxFormat::Store({FbxFormat::ScaledColumns(rotation, scaling), {pT[0], pT[1], pT[2]}}, *this);
 }
 
 void fbxsdk::FbxAMatrix::SetIdentity()
 {
-	FbxFile::Store(VAffine(), *this);
+	FbxFormat::Store(VAffine(), *this);
 }
 
 void fbxsdk::FbxAMatrix::SetT(const FbxVector4& pT)
@@ -25,13 +25,13 @@ void fbxsdk::FbxAMatrix::SetT(const FbxVector4& pT)
 fbxsdk::FbxAMatrix fbxsdk::FbxAMatrix::operator*(const FbxAMatrix& pOther) const
 {
 	FbxAMatrix product;
-	FbxFile::Store(FbxFile::Product(FbxFile::Load(*this), FbxFile::Load(pOther)), product);
+	FbxFormat::Store(FbxFormat::Product(FbxFormat::Load(*this), FbxFormat::Load(pOther)), product);
 	return product;
 }
 
 fbxsdk::FbxAMatrix fbxsdk::FbxAMatrix::Inverse() const
 {
 	FbxAMatrix inverse;
-	FbxFile::Store(FbxFile::Inverse(FbxFile::Load(*this)), inverse);
+	FbxFormat::Store(FbxFormat::Inverse(FbxFormat::Load(*this)), inverse);
 	return inverse;
 }

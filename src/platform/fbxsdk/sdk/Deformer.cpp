@@ -4,13 +4,33 @@
 
 #include <algorithm>
 
+void fbxsdk::FbxCluster::AddJobs(std::vector<FbxFormat::VDecodeJob>& io_rJobs) const
+{
+	io_rJobs.push_back({m_Record.Child("Indexes"), GetName(), &m_Indices});
+	io_rJobs.push_back({m_Record.Child("Weights"), GetName(), &m_Weights});
+}
+
 void fbxsdk::FbxCluster::Load() const
 {
 	if (m_bLoaded)
 		return;
+	// Who reads one reads them all.
+	std::vector<const FbxCluster*> clusters{this};
+	if (m_pSkin)
+		for (const FbxCluster* const pOther : m_pSkin->m_Clusters)
+			if (!pOther->m_bLoaded && pOther->m_pSkin == m_pSkin && pOther != this)
+				clusters.push_back(pOther);
+	std::vector<FbxFormat::VDecodeJob> jobs;
+	for (const FbxCluster* const pCluster : clusters)
+		pCluster->AddJobs(jobs);
+	FbxFormat::Decode(jobs);
+	for (const FbxCluster* const pCluster : clusters)
+		pCluster->EndJobs();
+}
+
+void fbxsdk::FbxCluster::EndJobs() const
+{
 	m_bLoaded = true;
-	FbxFile::Decode(m_Record.Child("Indexes"), GetName(), m_Indices);
-	FbxFile::Decode(m_Record.Child("Weights"), GetName(), m_Weights);
 	if (m_Indices.size() != m_Weights.size())
 		NVX_LOG("FBXIO", NVX::ELogWarning, "Cluster %1% has %2% indices and %3% weights; the rest is left out",
 		    GetName(), m_Indices.size(), m_Weights.size());
@@ -41,7 +61,7 @@ fbxsdk::FbxAMatrix fbxsdk::FbxCluster::Matrix(const char* i_pName) const
 {
 	FbxAMatrix matrix;
 	std::vector<double> entries;
-	FbxFile::Decode(m_Record.Child(i_pName), GetName(), entries);
+	FbxFormat::Decode({m_Record.Child(i_pName), GetName(), &entries});
 	if (entries.size() == 16)
 		for (int i = 0; i < 16; ++i)
 			if (i % 4 != 3)

@@ -4,7 +4,7 @@
 #include "fbxsdk/sdk/AffineMatrix.h"
 #include "fbxsdk/sdk/Object.h"
 
-namespace FbxFile
+namespace FbxFormat
 {
 class VSceneBuilder;
 }
@@ -13,6 +13,7 @@ namespace fbxsdk
 {
 
 class FbxNode;
+class FbxSkin;
 
 class FbxDeformer : public FbxObject
 {
@@ -46,17 +47,21 @@ public:
 	FbxAMatrix& GetTransformLinkMatrix(FbxAMatrix& pMatrix) const;
 
 private:
-	friend class FbxFile::VSceneBuilder;
+	friend class FbxFormat::VSceneBuilder;
 
-	FbxCluster(std::string i_Name, const FbxFile::VArraySource& i_rRecord)
+	FbxCluster(std::string i_Name, const FbxFormat::VArraySource& i_rRecord)
 	    : FbxObject(std::move(i_Name)), m_Record(i_rRecord)
 	{
 	}
 	void Load() const;
+	void AddJobs(std::vector<FbxFormat::VDecodeJob>& io_rJobs) const;
+	void EndJobs() const;
 	FbxAMatrix Matrix(const char* i_pName) const;
 
-	FbxFile::VArraySource m_Record;
+	FbxFormat::VArraySource m_Record;
 	FbxNode* m_pLink = nullptr;
+	/// The first that it belongs to.
+	const FbxSkin* m_pSkin = nullptr;
 	mutable bool m_bLoaded = false;
 	mutable std::vector<int> m_Indices;
 	mutable std::vector<double> m_Weights;
@@ -73,7 +78,8 @@ public:
 	}
 
 private:
-	friend class FbxFile::VSceneBuilder;
+	friend class FbxCluster;
+	friend class FbxFormat::VSceneBuilder;
 	using FbxDeformer::FbxDeformer;
 
 	std::vector<FbxCluster*> m_Clusters;

@@ -1,6 +1,6 @@
 #pragma once
 
-namespace FbxFile
+namespace FbxFormat
 {
 class VSceneBuilder;
 }
@@ -57,7 +57,7 @@ public:
 	FbxAxisSystem GetAxisSystem() const { return {m_UpVector, m_UpSign}; }
 
 private:
-	friend class FbxFile::VSceneBuilder;
+	friend class FbxFormat::VSceneBuilder;
 
 	/// What holds for a file that does not tell: centimetres, Y up.
 	double m_UnitScaleFactor = 1.0;

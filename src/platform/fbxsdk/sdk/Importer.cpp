@@ -6,8 +6,16 @@
 #include "fbxsdk/scene/SceneBuilder.h"
 #include "fbxsdk/sdk/Manager.h"
 #include "fbxsdk/sdk/Scene.h"
+#include "fbxsdk/sdk/Stream.h"
 
-#include <limits>
+#include <algorithm>
+
+namespace
+{
+
+constexpr const char* c_pCancelled = "Import was cancelled";
+
+} // namespace
 
 fbxsdk::FbxImporter::FbxImporter(FbxManager& i_rManager, const char* i_pName)
     : FbxObject(i_pName), m_rManager(i_rManager)
@@ -20,6 +28,8 @@ fbxsdk::FbxImporter* fbxsdk::FbxImporter::Create(FbxManager* pManager, const cha
 	pManager->Own(std::unique_ptr<FbxObject>(pImporter));
 	return pImporter;
 }
+
+fbxsdk::FbxImporter::~FbxImporter() = default;
 
 void fbxsdk::FbxImporter::Destroy(bool /*pRecursive*/)
 {
@@ -34,26 +44,62 @@ bool fbxsdk::FbxImporter::Fail(FbxStatus::EStatusCode i_Code, const std::string&
 
 bool fbxsdk::FbxImporter::Initialize(const char* pFileName, int pFileFormat, FbxIOSettings* pIOSettings)
 {
-	using FbxFile::EFileKind;
 	m_bInitialized = false;
-	m_Version = 0;
-	if (pFileFormat < -1 || pFileFormat > FbxIOPluginRegistry::c_TextFormat || pIOSettings)
-		return Fail(FbxStatus::eInvalidParameter, "No reader of that format with those settings");
-	FbxFile::VFileBytes head;
+	m_pStreamBytes.reset();
+	FbxFormat::VFileBytes head;
 	std::string reason;
-	if (!head.Read(pFileName, FbxFile::Limits::c_TextHeaderBytes, reason))
+	if (!AcceptsFormat(pFileFormat, pIOSettings))
+		return false;
+	if (!head.Read(pFileName, FbxFormat::Limits::c_TextHeaderBytes, reason))
 		return Fail(FbxStatus::eFailure, reason);
-	const FbxFile::VFileKind kind = FbxFile::DetectFileKind(head.View());
+	m_FileName = pFileName;
+	return AcceptsHead(head);
+}
+
+bool fbxsdk::FbxImporter::Initialize(
+    FbxStream* pStream, void* pStreamData, const int pFileFormat, FbxIOSettings* pIOSettings)
+{
+	m_bInitialized = false;
+	m_pStreamBytes.reset();
+	if (!AcceptsFormat(pFileFormat, pIOSettings))
+		return false;
+	if (!pStream || !pStream->Open(pStreamData))
+		return Fail(FbxStatus::eFailure, "File cannot be opened");
+	pStream->Seek(0, FbxFile::eEnd);
+	const FbxInt64 size = pStream->GetPosition();
+	if (size > FbxInt64(FbxFormat::Limits::c_FileBytes))
+		return Fail(FbxStatus::eFailure, "File is larger than 2 GiB");
+	pStream->Seek(0, FbxFile::eBegin);
+	auto pBytes = std::make_unique<FbxFormat::VFileBytes>();
+	const auto wanted = FbxUInt64(std::max<FbxInt64>(size, 0));
+	const bool bRead = pStream->Read(pBytes->Resize(wanted), wanted) == wanted && pStream->GetError() == 0;
+	pStream->Close();
+	if (!bRead)
+		return Fail(FbxStatus::eFailure, "File cannot be read");
+	m_pStreamBytes = std::move(pBytes);
+	return AcceptsHead(*m_pStreamBytes);
+}
+
+bool fbxsdk::FbxImporter::AcceptsFormat(int i_FileFormat, const FbxIOSettings* i_pSettings)
+{
+	m_Version = 0;
+	const bool bAccepts = i_FileFormat >= -1 && i_FileFormat <= FbxIOPluginRegistry::c_TextFormat && !i_pSettings;
+	return bAccepts || Fail(FbxStatus::eInvalidParameter, "No reader of that format with those settings");
+}
+
+bool fbxsdk::FbxImporter::AcceptsHead(const FbxFormat::VFileBytes& i_rHead)
+{
+	using FbxFormat::EFileKind;
+	const FbxFormat::VFileKind kind = FbxFormat::DetectFileKind(i_rHead.View());
 	m_Version = kind.m_Version;
 	if (kind.m_Kind == EFileKind::None)
-		return Fail(FbxStatus::eInvalidFile, head.View().empty() ? "File is empty" : "File is not an FBX file");
+		return Fail(FbxStatus::eInvalidFile, i_rHead.View().empty() ? "File is empty" : "File is not an FBX file");
 	if (kind.m_Kind == EFileKind::DamagedBinary)
 		return Fail(FbxStatus::eInvalidFile, "File is corrupted: its first bytes are damaged");
 	if (kind.m_Kind == EFileKind::BinaryBigEndian)
 		return Fail(FbxStatus::eInvalidFile, "File is written in big-endian byte order, which is not read");
-	if (kind.m_Version < FbxFile::c_OldestVersion || kind.m_Version >= FbxFile::c_TooNewVersion)
+	if (kind.m_Version < FbxFormat::c_OldestVersion || kind.m_Version >= FbxFormat::c_TooNewVersion)
 		return Fail(FbxStatus::eInvalidFileVersion, "File version is not one of 6.0 to 7.9");
-	m_FileName = pFileName;
 	m_bInitialized = true;
 	m_Status = {};
 	return true;
@@ -64,13 +110,24 @@ bool fbxsdk::FbxImporter::Import(FbxDocument* pDocument, bool pNonBlocking)
 	auto* const pScene = dynamic_cast<FbxScene*>(pDocument);
 	if (!m_bInitialized || !pScene || pNonBlocking)
 		return Fail(FbxStatus::eInvalidParameter, "Import needs an initialized importer and a scene to wait for");
-	FbxFile::VFileBytes bytes;
+	FbxFormat::VFileBytes bytes;
+	FbxFormat::VProgress progress(m_pProgress, m_pProgressArguments);
 	std::string reason;
-	if (!bytes.Read(m_FileName, std::numeric_limits<std::size_t>::max(), reason))
+	if (m_pStreamBytes)
+	{
+		bytes = std::move(*m_pStreamBytes);
+		m_pStreamBytes.reset();
+		m_bInitialized = false;
+	}
+	else if (!bytes.Read(m_FileName, progress, reason))
 		return Fail(FbxStatus::eFailure, reason);
+	if (progress.IsCancelled())
+		return Fail(FbxStatus::eFailure, c_pCancelled);
 	// The file may have changed since it was looked at.
-	const FbxFile::VFileKind kind = FbxFile::DetectFileKind(bytes.View());
-	const FbxFile::VImportResult result = FbxFile::VSceneBuilder(*pScene).Build(std::move(bytes), kind);
+	const FbxFormat::VFileKind kind = FbxFormat::DetectFileKind(bytes.View());
+	const FbxFormat::VImportResult result = FbxFormat::VSceneBuilder(*pScene).Build(std::move(bytes), kind, progress);
+	if (progress.IsCancelled())
+		return Fail(FbxStatus::eFailure, c_pCancelled);
 	if (result.m_bEncrypted)
 		return Fail(FbxStatus::ePasswordError, "File asks for a password");
 	if (!result.m_Error.empty())

@@ -8,12 +8,12 @@ namespace
 using namespace fbxsdk;
 
 template <typename TEnum, std::size_t c_Count>
-TEnum ReadMode(const FbxFile::VArraySource& i_rRecord, const char* i_pName,
+TEnum ReadMode(const FbxFormat::VArraySource& i_rRecord, const char* i_pName,
     const std::pair<std::string_view, TEnum> (&i_rModes)[c_Count])
 {
-	if (const FbxFile::VElementIndex element = i_rRecord.Child(i_pName).m_Element; element != FbxFile::c_NoElement)
+	if (const FbxFormat::VElementIndex element = i_rRecord.Child(i_pName).m_Element; element != FbxFormat::c_NoElement)
 		for (const auto& [name, mode] : i_rModes)
-			if (FbxFile::ValueAt(*i_rRecord.m_pTree, element, 0).m_Text == name)
+			if (FbxFormat::ValueAt(*i_rRecord.m_pTree, element, 0).m_Text == name)
 				return mode;
 	return TEnum();
 }
@@ -28,7 +28,7 @@ constexpr std::pair<std::string_view, FbxLayerElement::EReferenceMode> c_Referen
 
 } // namespace
 
-fbxsdk::FbxLayerElement::FbxLayerElement(const FbxFile::VArraySource& i_rRecord)
+fbxsdk::FbxLayerElement::FbxLayerElement(const FbxFormat::VArraySource& i_rRecord)
     : m_MappingMode(ReadMode(i_rRecord, "MappingInformationType", c_MappingModes)),
       m_ReferenceMode(ReadMode(i_rRecord, "ReferenceInformationType", c_ReferenceModes))
 {

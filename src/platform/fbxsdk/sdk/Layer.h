@@ -102,7 +102,7 @@ public:
 protected:
 	FbxLayerElement() = default;
 	/// From the record of a layer element.
-	explicit FbxLayerElement(const FbxFile::VArraySource& i_rRecord);
+	explicit FbxLayerElement(const FbxFormat::VArraySource& i_rRecord);
 
 	EMappingMode m_MappingMode = eNone;
 	EReferenceMode m_ReferenceMode = eDirect;
@@ -129,27 +129,47 @@ private:
 	}
 
 	FbxLayerElementTemplate(
-	    const FbxFile::VArraySource& i_rRecord, const char* i_pDirect, const char* i_pIndex, std::string i_Owner)
+	    const FbxFormat::VArraySource& i_rRecord, const char* i_pDirect, const char* i_pIndex, std::string i_Owner)
 	    : FbxLayerElement(i_rRecord), m_Owner(std::move(i_Owner)), m_DirectSource(i_rRecord.Child(i_pDirect)),
 	      m_IndexSource(i_rRecord.Child(i_pIndex))
 	{
 	}
 
 	template <typename TArray>
-	TArray& Loaded(TArray& io_rArray, FbxFile::VArraySource& io_rSource) const
+	TArray& Loaded(TArray& io_rArray, FbxFormat::VArraySource& io_rSource) const
 	{
-		if (io_rSource.m_Element != FbxFile::c_NoElement)
+		if (io_rSource.m_Element != FbxFormat::c_NoElement)
 		{
-			FbxFile::Decode(io_rSource, m_Owner.c_str(), io_rArray.Numbers());
+			FbxFormat::Decode({io_rSource, m_Owner.c_str(), &io_rArray.Numbers()});
 			io_rArray.Count();
-			io_rSource.m_Element = FbxFile::c_NoElement;
+			io_rSource.m_Element = FbxFormat::c_NoElement;
 		}
 		return io_rArray;
 	}
 
+	/// For decoding both arrays, as far as a mapping by points or polygon vertices needs them, together with others.
+	void AddJobs(std::vector<FbxFormat::VDecodeJob>& io_rJobs) const
+	{
+		if (m_MappingMode == eByControlPoint || m_MappingMode == eByPolygonVertex)
+			io_rJobs.push_back({m_DirectSource, m_Owner.c_str(), &m_Direct.Numbers()});
+		if (m_MappingMode == eByPolygonVertex && m_ReferenceMode != eDirect)
+			io_rJobs.push_back({m_IndexSource, m_Owner.c_str(), &m_Index.Numbers()});
+	}
+
+	/// After them.
+	void EndJobs() const
+	{
+		if (m_MappingMode == eByControlPoint || m_MappingMode == eByPolygonVertex)
+			m_DirectSource.m_Element = FbxFormat::c_NoElement;
+		if (m_MappingMode == eByPolygonVertex && m_ReferenceMode != eDirect)
+			m_IndexSource.m_Element = FbxFormat::c_NoElement;
+		m_Direct.Count();
+		m_Index.Count();
+	}
+
 	std::string m_Owner;
-	mutable FbxFile::VArraySource m_DirectSource;
-	mutable FbxFile::VArraySource m_IndexSource;
+	mutable FbxFormat::VArraySource m_DirectSource;
+	mutable FbxFormat::VArraySource m_IndexSource;
 	mutable FbxLayerElementArrayTemplate<T> m_Direct;
 	mutable FbxLayerElementArrayTemplate<int> m_Index;
 };

@@ -8,20 +8,26 @@
 
 bool fbxsdk::FbxIOPluginRegistry::DetectReaderFileFormat(const char* pFileName, int& pFileFormat) const
 {
-	FbxFile::VFileBytes head;
+	FbxFormat::VFileBytes head;
 	std::string reason;
-	if (!head.Read(pFileName, FbxFile::Limits::c_TextHeaderBytes, reason))
+	if (!head.Read(pFileName, FbxFormat::Limits::c_TextHeaderBytes, reason))
 		return false;
-	switch (FbxFile::DetectFileKind(head.View()).m_Kind)
+	switch (FbxFormat::DetectFileKind(head.View()).m_Kind)
 	{
-	case FbxFile::EFileKind::None: return false;
-	case FbxFile::EFileKind::Text: pFileFormat = c_TextFormat; return true;
-	case FbxFile::EFileKind::Binary:
-	case FbxFile::EFileKind::BinaryBigEndian:
-	case FbxFile::EFileKind::DamagedBinary: break;
+	case FbxFormat::EFileKind::None: return false;
+	case FbxFormat::EFileKind::Text: pFileFormat = c_TextFormat; return true;
+	case FbxFormat::EFileKind::Binary:
+	case FbxFormat::EFileKind::BinaryBigEndian:
+	case FbxFormat::EFileKind::DamagedBinary: break;
 	}
 	pFileFormat = c_BinaryFormat;
 	return true;
+}
+
+int fbxsdk::FbxIOPluginRegistry::FindReaderIDByExtension(const char* pExt) const
+{
+	const std::string_view extension(pExt);
+	return extension == "fbx" || extension == "FBX" ? c_BinaryFormat : -1;
 }
 
 fbxsdk::FbxManager* fbxsdk::FbxManager::Create()

@@ -17,6 +17,9 @@ public:
 
 	int GetNativeReaderFormat() const { return c_BinaryFormat; }
 
+	/// -1 if it is not "fbx".
+	int FindReaderIDByExtension(const char* pExt) const;
+
 	static constexpr int c_BinaryFormat = 0;
 	static constexpr int c_TextFormat = 1;
 };

@@ -10,7 +10,7 @@ namespace fbxsdk
 class FbxSurfaceMaterial : public FbxObject
 {
 protected:
-	friend class FbxFile::VMaterialReader;
+	friend class FbxFormat::VMaterialReader;
 	using FbxObject::FbxObject;
 };
 
@@ -28,7 +28,7 @@ public:
 	FbxPropertyT<FbxDouble> TransparencyFactor{0.0};
 
 protected:
-	friend class FbxFile::VMaterialReader;
+	friend class FbxFormat::VMaterialReader;
 	using FbxSurfaceMaterial::FbxSurfaceMaterial;
 };
 
@@ -42,7 +42,7 @@ public:
 	FbxPropertyT<FbxDouble> ReflectionFactor{1.0};
 
 private:
-	friend class FbxFile::VMaterialReader;
+	friend class FbxFormat::VMaterialReader;
 	using FbxSurfaceLambert::FbxSurfaceLambert;
 };
 
@@ -54,7 +54,7 @@ public:
 	const char* GetRelativeFileName() const { return m_RelativeFileName.c_str(); }
 
 private:
-	friend class FbxFile::VMaterialReader;
+	friend class FbxFormat::VMaterialReader;
 
 	FbxFileTexture(std::string i_Name, std::string i_FileName, std::string i_RelativeFileName)
 	    : FbxObject(std::move(i_Name)), m_FileName(std::move(i_FileName)),

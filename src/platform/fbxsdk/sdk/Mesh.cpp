@@ -2,60 +2,64 @@
 
 #include "DebugServices/GlobalLog.h"
 
+#include <algorithm>
 #include <cmath>
 
-int fbxsdk::FbxGeometryBase::GetControlPointsCount() const
+namespace
 {
-	Load();
-	return int(m_Points.size() / 3);
-}
 
-fbxsdk::FbxVector4 fbxsdk::FbxGeometryBase::GetControlPointAt(int pIndex) const
+constexpr const char* c_pNormals = "LayerElementNormal";
+constexpr const char* c_pUVs = "LayerElementUV";
+constexpr const char* c_pMaterials = "LayerElementMaterial";
+
+} // namespace
+
+const std::vector<FbxFormat::VElementIndex>& fbxsdk::FbxGeometryBase::LayerRecords(std::string_view i_Name) const
 {
-	if (pIndex < 0 || pIndex >= GetControlPointsCount())
-		return {};
-	const double* const p = m_Points.data() + 3 * std::size_t(pIndex);
-	return {p[0], p[1], p[2]};
+	// Found once: a mesh may be placed many times, and have many records.
+	if (m_LayerRecords.empty())
+	{
+		for (const char* pName : {c_pNormals, c_pUVs, c_pMaterials})
+			m_LayerRecords[pName];
+		for (const FbxFormat::VElementIndex child : m_Record.m_pTree->Children(m_Record.m_Element))
+			if (const auto found = m_LayerRecords.find(m_Record.m_pTree->Name(child)); found != m_LayerRecords.end())
+				found->second.push_back(child);
+	}
+	return m_LayerRecords.find(i_Name)->second;
 }
 
 template <typename T>
 T* fbxsdk::FbxGeometryBase::Element(
-    VElements<T>& io_rElements, const char* i_pRecord, const char* i_pDirect, const char* i_pIndex, int i_Place)
+    VElements<T>& io_rElements, const char* i_pRecord, const char* i_pDirect, const char* i_pIndex, int i_Place) const
 {
 	if (const auto found = io_rElements.find(i_Place); found != io_rElements.end())
 		return found->second.get();
-	int place = 0;
-	for (const FbxFile::VElementIndex child : m_Record.m_pTree->Children(m_Record.m_Element))
-		if (m_Record.m_pTree->Name(child) == i_pRecord && place++ == i_Place)
-		{
-			const FbxFile::VArraySource record{m_Record.m_pTree, m_Record.m_pBudget, child};
-			return io_rElements.emplace(i_Place, new T(record, i_pDirect, i_pIndex, GetName())).first->second.get();
-		}
-	return nullptr;
+	const std::vector<FbxFormat::VElementIndex>& rRecords = LayerRecords(i_pRecord);
+	if (i_Place < 0 || std::size_t(i_Place) >= rRecords.size())
+		return nullptr;
+	const FbxFormat::VArraySource record{m_Record.m_pTree, m_Record.m_pBudget, rRecords[i_Place]};
+	return io_rElements.emplace(i_Place, new T(record, i_pDirect, i_pIndex, GetName())).first->second.get();
 }
 
 fbxsdk::FbxGeometryElementNormal* fbxsdk::FbxGeometryBase::GetElementNormal(int pIndex)
 {
-	return Element(m_Normals, "LayerElementNormal", "Normals", "NormalsIndex", pIndex);
+	return Element(m_Normals, c_pNormals, "Normals", "NormalsIndex", pIndex);
 }
 
 fbxsdk::FbxGeometryElementUV* fbxsdk::FbxGeometryBase::GetElementUV(
     int pIndex, FbxLayerElement::EType /*pTypeIdentifier*/)
 {
-	return Element(m_UVs, "LayerElementUV", "UV", "UVIndex", pIndex);
+	return Element(m_UVs, c_pUVs, "UV", "UVIndex", pIndex);
 }
 
 fbxsdk::FbxGeometryElementMaterial* fbxsdk::FbxGeometryBase::GetElementMaterial(int pIndex)
 {
-	return Element(m_Materials, "LayerElementMaterial", "", "Materials", pIndex);
+	return Element(m_Materials, c_pMaterials, "", "Materials", pIndex);
 }
 
 int fbxsdk::FbxGeometryBase::GetElementMaterialCount() const
 {
-	int count = 0;
-	for (const FbxFile::VElementIndex child : m_Record.m_pTree->Children(m_Record.m_Element))
-		count += m_Record.m_pTree->Name(child) == "LayerElementMaterial" ? 1 : 0;
-	return count;
+	return int(LayerRecords(c_pMaterials).size());
 }
 
 fbxsdk::FbxDeformer* fbxsdk::FbxGeometry::GetDeformer(
@@ -71,13 +75,19 @@ bool fbxsdk::FbxMesh::IsSound() const
 	return m_bSound;
 }
 
-void fbxsdk::FbxMesh::Load() const
+void fbxsdk::FbxMesh::LoadArrays() const
 {
-	if (m_bLoaded)
-		return;
 	m_bLoaded = true;
-	m_bSound = FbxFile::Decode(m_Record.Child("Vertices"), GetName(), m_Points)
-	    && FbxFile::Decode(m_Record.Child("PolygonVertexIndex"), GetName(), m_PolygonVertices);
+	std::vector<FbxFormat::VDecodeJob> jobs{{m_Record.Child("Vertices"), GetName(), &m_Points},
+	    {m_Record.Child("PolygonVertexIndex"), GetName(), &m_PolygonVertices}};
+	// Who reads a mesh asks for its texture coordinates next.
+	const FbxGeometryElementUV* const pUV = Element(m_UVs, c_pUVs, "UV", "UVIndex", 0);
+	if (pUV)
+		pUV->AddJobs(jobs);
+	FbxFormat::Decode(jobs);
+	if (pUV)
+		pUV->EndJobs();
+	m_bSound = jobs[0].m_bSound && jobs[1].m_bSound;
 	if (m_bSound)
 		CutPolygons();
 	else
@@ -87,6 +97,10 @@ void fbxsdk::FbxMesh::Load() const
 void fbxsdk::FbxMesh::CutPolygons() const
 {
 	const int points = int(m_Points.size() / 3);
+	const auto polygons = std::size_t(
+	    std::count_if(m_PolygonVertices.begin(), m_PolygonVertices.end(), [](int i_Vertex) { return i_Vertex < 0; }));
+	m_PolygonStarts.reserve(polygons);
+	m_PolygonSizes.reserve(polygons);
 	int start = 0;
 	int broken = 0;
 	bool bSound = true;
@@ -156,7 +170,10 @@ bool fbxsdk::FbxMesh::GenerateNormals(bool pOverwrite, bool pByCtrlPoint, bool p
 	}
 	for (std::size_t i = 0; i < normals.size(); i += 3)
 	{
-		const double length = std::hypot(normals[i], normals[i + 1], normals[i + 2]);
+		double square = 0.0;
+		for (int x = 0; x < 3; ++x)
+			square += normals[i + x] * normals[i + x];
+		const double length = std::sqrt(square);
 		for (int x = 0; x < 3; ++x)
 			normals[i + x] = length > 0.0 && std::isfinite(length) ? normals[i + x] / length : 0.0;
 	}

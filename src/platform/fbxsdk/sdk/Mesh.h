@@ -14,10 +14,20 @@ namespace fbxsdk
 class FbxGeometryBase : public FbxNodeAttribute
 {
 public:
-	int GetControlPointsCount() const;
+	int GetControlPointsCount() const
+	{
+		Load();
+		return int(m_Points.size() / 3);
+	}
 
 	/// Relative to the node, in file units. Zeros beyond the end.
-	FbxVector4 GetControlPointAt(int pIndex) const;
+	FbxVector4 GetControlPointAt(int pIndex) const
+	{
+		if (pIndex < 0 || pIndex >= GetControlPointsCount())
+			return {};
+		const double* const p = m_Points.data() + 3 * std::size_t(pIndex);
+		return {p[0], p[1], p[2]};
+	}
 
 	/// The elements of a kind in the order of the file; null if there are not so many.
 	FbxGeometryElementNormal* GetElementNormal(int pIndex = 0);
@@ -27,27 +37,36 @@ public:
 	int GetElementMaterialCount() const;
 
 protected:
-	FbxGeometryBase(std::string i_Name, const FbxFile::VArraySource& i_rRecord)
+	FbxGeometryBase(std::string i_Name, const FbxFormat::VArraySource& i_rRecord)
 	    : FbxNodeAttribute(std::move(i_Name)), m_Record(i_rRecord)
 	{
 	}
-	virtual void Load() const = 0;
+	void Load() const
+	{
+		if (!m_bLoaded)
+			LoadArrays();
+	}
+	virtual void LoadArrays() const = 0;
 
 	template <typename T>
 	using VElements = std::map<int, std::unique_ptr<T>>;
 
-	FbxFile::VArraySource m_Record;
+	template <typename T>
+	T* Element(VElements<T>& io_rElements, const char* i_pRecord, const char* i_pDirect, const char* i_pIndex,
+	    int i_Place) const;
+	/// The layer elements of that kind.
+	const std::vector<FbxFormat::VElementIndex>& LayerRecords(std::string_view i_Name) const;
+
+	FbxFormat::VArraySource m_Record;
+	mutable bool m_bLoaded = false;
 	/// Three for each point.
 	mutable std::vector<double> m_Points;
 	VElements<FbxGeometryElementNormal> m_Normals;
+	mutable VElements<FbxGeometryElementUV> m_UVs;
+	VElements<FbxGeometryElementMaterial> m_Materials;
 
 private:
-	template <typename T>
-	T* Element(
-	    VElements<T>& io_rElements, const char* i_pRecord, const char* i_pDirect, const char* i_pIndex, int i_Place);
-
-	VElements<FbxGeometryElementUV> m_UVs;
-	VElements<FbxGeometryElementMaterial> m_Materials;
+	mutable std::map<std::string_view, std::vector<FbxFormat::VElementIndex>> m_LayerRecords;
 };
 
 class FbxGeometry : public FbxGeometryBase
@@ -57,7 +76,7 @@ public:
 	FbxDeformer* GetDeformer(int pIndex, FbxDeformer::EDeformerType pDeformerType, FbxStatus* pStatus = nullptr) const;
 
 protected:
-	friend class FbxFile::VSceneBuilder;
+	friend class FbxFormat::VSceneBuilder;
 	using FbxGeometryBase::FbxGeometryBase;
 
 	std::vector<FbxSkin*> m_Skins;
@@ -70,8 +89,7 @@ public:
 
 	int GetPolygonCount() const
 	{
-		if (!m_bLoaded)
-			Load();
+		Load();
 		return int(m_PolygonStarts.size());
 	}
 
@@ -97,17 +115,16 @@ public:
 	bool GenerateNormals(bool pOverwrite = false, bool pByCtrlPoint = false, bool pCW = false);
 
 private:
-	friend class FbxFile::VSceneBuilder;
+	friend class FbxFormat::VSceneBuilder;
 	friend class FbxNode;
 
 	using FbxGeometry::FbxGeometry;
 
 	/// False if control points or polygons are damaged.
 	bool IsSound() const;
-	void Load() const override;
+	void LoadArrays() const override;
 	void CutPolygons() const;
 
-	mutable bool m_bLoaded = false;
 	mutable bool m_bSound = false;
 	mutable std::vector<int> m_PolygonVertices;
 	mutable std::vector<int> m_PolygonStarts;

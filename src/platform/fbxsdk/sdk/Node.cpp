@@ -77,7 +77,7 @@ fbxsdk::FbxSurfaceMaterial* fbxsdk::FbxNode::GetMaterial(int pIndex) const
 
 fbxsdk::FbxVector4 fbxsdk::FbxNode::GetPreRotation(EPivotSet pPivotSet) const
 {
-	const FbxFile::VNodeTransform& rProperties = m_pData->m_Properties;
+	const FbxFormat::VNodeTransform& rProperties = m_pData->m_Properties;
 	if (pPivotSet != eSourcePivot || !rProperties.m_bRotationActive)
 		return {};
 	const auto& [x, y, z] = rProperties.m_PreRotation;
@@ -86,13 +86,13 @@ fbxsdk::FbxVector4 fbxsdk::FbxNode::GetPreRotation(EPivotSet pPivotSet) const
 
 void fbxsdk::FbxNode::VData::Evaluate(const VData* i_pParent)
 {
-	const FbxFile::VLocalTransform local = FbxFile::LocalTransform(m_Properties);
-	m_Global = FbxFile::GlobalTransform(
-	    i_pParent ? i_pParent->m_Global : FbxFile::VGlobalTransform(), local, m_Properties.m_InheritType);
+	const FbxFormat::VLocalTransform local = FbxFormat::LocalTransform(m_Properties);
+	m_Global = FbxFormat::GlobalTransform(
+	    i_pParent ? i_pParent->m_Global : FbxFormat::VGlobalTransform(), local, m_Properties.m_InheritType);
 	const auto& [x, y, z] = m_Properties.m_Scaling;
 	m_LocalScaling = {x, y, z};
-	FbxFile::Store(local.m_Map, m_LocalMatrix);
-	FbxFile::Store(m_Global.m_Map, m_GlobalMatrix);
+	FbxFormat::Store(local.m_Map, m_LocalMatrix);
+	FbxFormat::Store(m_Global.m_Map, m_GlobalMatrix);
 	m_bEvaluated = true;
 }
 

@@ -6,7 +6,7 @@
 
 #include <memory>
 
-namespace FbxFile
+namespace FbxFormat
 {
 class VSceneBuilder;
 }
@@ -55,7 +55,7 @@ public:
 	bool IsSkeletonRoot() const { return m_Type == eRoot; }
 
 private:
-	friend class FbxFile::VSceneBuilder;
+	friend class FbxFormat::VSceneBuilder;
 
 	FbxSkeleton(std::string i_Name, EType i_Type) : FbxNodeAttribute(std::move(i_Name)), m_Type(i_Type) {}
 
@@ -111,7 +111,7 @@ public:
 	    bool pApplyTarget = false, bool pForceEval = false);
 
 private:
-	friend class FbxFile::VSceneBuilder;
+	friend class FbxFormat::VSceneBuilder;
 	struct VData;
 
 	explicit FbxNode(std::string i_Name);

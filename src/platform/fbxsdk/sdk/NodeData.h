@@ -12,11 +12,11 @@ struct fbxsdk::FbxNode::VData
 	FbxSkeleton* m_pSkeleton = nullptr;
 	FbxMesh* m_pMesh = nullptr;
 	std::vector<FbxSurfaceMaterial*> m_Materials;
-	FbxFile::VNodeTransform m_Properties;
+	FbxFormat::VNodeTransform m_Properties;
 
 	/// All that follows is filled by the first evaluation.
 	bool m_bEvaluated = false;
-	FbxFile::VGlobalTransform m_Global;
+	FbxFormat::VGlobalTransform m_Global;
 	FbxVector4 m_LocalScaling;
 	FbxAMatrix m_LocalMatrix;
 	FbxAMatrix m_GlobalMatrix;

@@ -4,7 +4,7 @@
 
 #include <vector>
 
-namespace FbxFile
+namespace FbxFormat
 {
 class VMaterialReader;
 }
@@ -38,7 +38,7 @@ public:
 	}
 
 private:
-	friend class FbxFile::VMaterialReader;
+	friend class FbxFormat::VMaterialReader;
 
 	std::vector<FbxObject*> m_Sources;
 };
@@ -51,7 +51,7 @@ public:
 	T Get() const { return m_Value; }
 
 private:
-	friend class FbxFile::VMaterialReader;
+	friend class FbxFormat::VMaterialReader;
 
 	T m_Value;
 };

@@ -16,7 +16,7 @@ void fbxsdk::FbxDocument::Destroy(bool /*pRecursive*/)
 
 fbxsdk::FbxScene::FbxScene(FbxManager& i_rManager, const char* i_pName) : FbxDocument(i_rManager, i_pName)
 {
-	FbxFile::VSceneBuilder(*this).BuildEmpty();
+	FbxFormat::VSceneBuilder(*this).BuildEmpty();
 }
 
 fbxsdk::FbxScene::~FbxScene() = default;

@@ -37,7 +37,7 @@ public:
 	FbxNode* GetRootNode() const;
 
 private:
-	friend class FbxFile::VSceneBuilder;
+	friend class FbxFormat::VSceneBuilder;
 	struct VContent;
 
 	FbxScene(FbxManager& i_rManager, const char* i_pName);

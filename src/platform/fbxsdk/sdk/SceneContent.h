@@ -13,11 +13,11 @@
 /// Node 0 is the root. The file stays, since what is large in it is read from there when somebody asks.
 struct fbxsdk::FbxScene::VContent
 {
-	FbxFile::VFileBytes m_Bytes;
-	FbxFile::VElementTree m_Tree;
-	std::unique_ptr<FbxFile::VDocument> m_pDocument;
+	FbxFormat::VFileBytes m_Bytes;
+	FbxFormat::VElementTree m_Tree;
+	std::unique_ptr<FbxFormat::VDocument> m_pDocument;
 	std::vector<std::unique_ptr<FbxNode>> m_Nodes;
 	/// What nodes consist of: attributes, deformers, materials, textures.
 	std::vector<std::unique_ptr<FbxObject>> m_Parts;
-	FbxFile::VDecodeBudget m_Budget;
+	FbxFormat::VDecodeBudget m_Budget;
 };
