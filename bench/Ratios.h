@@ -9,7 +9,8 @@
 #include <vector>
 
 /// Runs all benchmarks of a program and prints ratios between their rows behind the table. A row's time is the least of
-/// its repetitions' processor times: on a machine that does other work too, the rest is noise.
+/// its repetitions' processor times: on a machine that does other work too, the rest is noise. Of a row that is
+/// measured in real time, since it runs on several threads, it is the least of these.
 namespace Ratios
 {
 
@@ -34,10 +35,12 @@ public:
 				medians.push_back(rRun);
 			if (rRun.error_occurred || rRun.run_type != Run::RT_Iteration)
 				continue;
+			const double time =
+			    rRun.run_name.time_type.empty() ? rRun.GetAdjustedCPUTime() : rRun.GetAdjustedRealTime();
 			const auto [found, bNew] =
-			    m_Times.emplace(std::pair{rRun.run_name.function_name, rRun.run_name.args}, rRun.GetAdjustedCPUTime());
+			    m_Times.emplace(std::pair{rRun.run_name.function_name, rRun.run_name.args}, time);
 			if (!bNew)
-				found->second = std::min(found->second, rRun.GetAdjustedCPUTime());
+				found->second = std::min(found->second, time);
 		}
 		ConsoleReporter::ReportRuns(medians);
 	}

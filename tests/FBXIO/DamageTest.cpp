@@ -1,12 +1,10 @@
-#include "FBXIO/FBXReader.h"
-
-#include "MeshFile.h"
-#include "TestFile.h"
+#include "SmallFiles.h"
+#include "SoundScene.h"
 #include "TestLog.h"
 
 #include <gtest/gtest.h>
 
-#include <cstring>
+#include <cstdlib>
 
 using namespace FBXIO;
 using namespace FbxTest;
@@ -14,106 +12,104 @@ using namespace FbxTest;
 namespace
 {
 
-/// Sanitizers look at every byte; without them a fifth is enough.
-#if defined(__has_feature)
-#if __has_feature(address_sanitizer)
-#define RETARGET_SANITIZED
-#endif
-#endif
-#ifdef RETARGET_SANITIZED
-constexpr std::size_t c_Step = 1;
-#else
-constexpr std::size_t c_Step = 5;
-#endif
-
-/// A triangle with everything that a mesh can have, on two bones.
-std::string SmallCharacter(const VTestForm& i_rForm)
-{
-	const VTestScene scene{{{"hips", "LimbNode", -1, {}}, {"knee", "LimbNode", 0, {}}, {"body", "Mesh", -1, {}}},
-	    {{"UpAxis", {2}}}, {}, {}};
-	const VNumbers matrix{1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 0, 5, 0, 1};
-	return Write(i_rForm, scene,
-	    {{2, {0, 0, 0, 1, 0, 0, 0, 1, 0, 1, 1, 0}, {0, 1, -3, 1, 3, -3},
-	        {"ByVertice", "Direct", {0, 0, 1, 0, 0, 1, 0, 0, 1, 0, 0, 1}, {}},
-	        {"ByPolygonVertex", "IndexToDirect", {0, 0, 1, 0, 0, 1, 1, 1}, {0, 1, 2, 1, 3, 2}},
-	        {"ByPolygon", "IndexToDirect", {}, {0, 1}},
-	        {{"phong", {{"DiffuseColor", {1, 0.5, 0}}}, "", ""}, {"lambert", {}, "", ""}},
-	        {{0, {0, 1, 2}, {1, 0.5, 0.25}, matrix, matrix}, {1, {1, 2, 3}, {0.5, 0.75, 1}, matrix, matrix}}}});
-}
-
-template <typename TVertex>
-void ExpectWhole(const VMesh<TVertex>& i_rMesh)
-{
-	for (const VMeshPart& rPart : i_rMesh.m_Parts)
-	{
-		ASSERT_EQ(rPart.m_Indices.size() % (3 * rPart.m_IndexSize), 0u);
-		for (std::size_t at = 0; at < rPart.m_Indices.size(); at += rPart.m_IndexSize)
-		{
-			std::uint32_t index = 0;
-			std::memcpy(&index, rPart.m_Indices.data() + at, rPart.m_IndexSize);
-			ASSERT_LT(index, i_rMesh.m_Vertices.size());
-		}
-	}
-}
-
-/// Whatever comes of the bytes is whole.
-/// @return whether all of it could be read.
+/// What comes of the bytes must be whole.
+/// @return whether all of them could be read.
 bool ExpectSound(const std::string& i_rBytes)
 {
-	const VTestLog quiet;
-	const VTestFile file(i_rBytes);
 	FBXReader reader;
-	const bool bLoaded = reader.LoadFile(file.Path());
-	if (!bLoaded)
+	if (!reader.LoadMemory(i_rBytes, "memory.fbx"))
 	{
 		EXPECT_FALSE(reader.HasSkeleton());
 		return false;
 	}
-	std::vector<VPlacedMesh> placed;
-	reader.ReadPlacedMeshes(placed);
-	for (const VPlacedMesh& rPlaced : placed)
-		ExpectWhole(rPlaced.m_Mesh);
-	VSkin skin;
-	reader.ReadSkin(skin);
-	for (const VSkinMesh& rMesh : skin.m_Meshes)
-	{
-		ExpectWhole(rMesh);
-		for (const VSkinVertex& rVertex : rMesh.m_Vertices)
-		{
-			const auto& [a, b, c, d] = rVertex.m_BoneWeights;
-			EXPECT_LE(a + b + c + d, 255);
-		}
-	}
+	EXPECT_EQ(WhatIsUnsound(reader), "");
 	return reader.IsComplete();
 }
 
-class DamagedCharacter : public testing::TestWithParam<VTestForm>
+/// Nothing is told, and the stack is small.
+class DamagedFile : public testing::TestWithParam<VSmallFile>
 {
+protected:
+	const std::vector<VTestRecord> m_Records = SmallRecords(GetParam());
+	const std::string m_Bytes = Write(GetParam().m_Form, m_Records);
+	const VTestLog m_Quiet;
 };
 
-TEST_P(DamagedCharacter, CutAnywhereLeavesWhatIsWhole)
+TEST_P(DamagedFile, CutAnywhereIsIncomplete)
 {
-	const std::string bytes = SmallCharacter(GetParam());
-	EXPECT_TRUE(ExpectSound(bytes));
-	const std::size_t end = GetParam().m_Form == EForm::Binary ? bytes.size() - 40 : bytes.size() - 1;
-	for (std::size_t size = 0; size < end && !HasFailure(); size += c_Step)
-		EXPECT_FALSE(ExpectSound(bytes.substr(0, size))) << size;
+	OnSmallStack(
+	    [this]
+	    {
+		    EXPECT_TRUE(ExpectSound(m_Bytes));
+		    // Behind this stands nothing that is read: the footer, or a last end of line.
+		    const std::size_t end = m_Bytes.size() - (GetParam().m_Form.m_Form == EForm::Binary ? 40 : 1);
+		    for (std::size_t size = 0; size <= m_Bytes.size() && !HasFailure(); ++size)
+			    EXPECT_EQ(ExpectSound(m_Bytes.substr(0, size)), size >= end) << size;
+	    });
 }
 
-TEST_P(DamagedCharacter, FourPatchesOfEveryByte)
+TEST_P(DamagedFile, FourPatchesOfEveryByte)
 {
-	const std::string bytes = SmallCharacter(GetParam());
-	for (std::size_t at = 0; at < bytes.size() && !HasFailure(); at += c_Step)
-		for (const char patch : {'\0', '\xff', char(bytes[at] ^ 1), char(bytes[at] ^ 0x80)})
-		{
-			SCOPED_TRACE(at);
-			std::string patched = bytes;
-			patched[at] = patch;
-			ExpectSound(patched);
-		}
+	OnSmallStack(
+	    [this]
+	    {
+		    for (std::size_t at = 0; at < m_Bytes.size() && !HasFailure(); ++at)
+			    for (const char patch : {'\0', '\xff', char(m_Bytes[at] ^ 1), char(m_Bytes[at] ^ 0x80)})
+			    {
+				    SCOPED_TRACE(at);
+				    std::string patched = m_Bytes;
+				    patched[at] = patch;
+				    ExpectSound(patched);
+			    }
+	    });
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Forms, DamagedCharacter, testing::ValuesIn(c_Forms), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
+/// RETARGET_MUTATIONS is by how many times more mutations are made than in a usual run.
+std::size_t Times(std::size_t i_Count)
+{
+	const char* const pTimes = std::getenv("RETARGET_MUTATIONS");
+	return i_Count * (pTimes ? std::strtoul(pTimes, nullptr, 10) : 1);
+}
+
+TEST_P(DamagedFile, MutatedBytes)
+{
+	OnSmallStack(
+	    [this]
+	    {
+		    std::size_t complete = 0;
+		    const std::size_t count = Times(170);
+		    for (std::size_t seed = 0; seed < count && !HasFailure(); ++seed)
+		    {
+			    SCOPED_TRACE(seed);
+			    std::mt19937 random{std::mt19937::result_type(seed)};
+			    complete += ExpectSound(MutateBytes(m_Bytes, random));
+		    }
+		    EXPECT_GT(complete, 0u);
+		    EXPECT_LT(complete, count / 2);
+	    });
+}
+
+TEST_P(DamagedFile, MutatedRecords)
+{
+	OnSmallStack(
+	    [this]
+	    {
+		    std::size_t complete = 0;
+		    const std::size_t count = Times(34);
+		    for (std::size_t seed = 0; seed < count && !HasFailure(); ++seed)
+		    {
+			    SCOPED_TRACE(seed);
+			    std::mt19937 random{std::mt19937::result_type(seed)};
+			    // Some in the form of another version than that of their records.
+			    const VTestForm& rForm = random() % 8 == 0 ? c_Forms[random() % 5] : GetParam().m_Form;
+			    complete += ExpectSound(Write(rForm, MutateRecords(m_Records, random)));
+		    }
+		    EXPECT_GT(complete, count / 5);
+		    EXPECT_LT(complete, count);
+	    });
+}
+
+INSTANTIATE_TEST_SUITE_P(Small, DamagedFile, testing::ValuesIn(c_SmallFiles),
+    [](const auto& i_rInfo) { return std::string(i_rInfo.param.m_pName); });
 
 } // namespace

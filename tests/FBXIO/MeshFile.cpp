@@ -101,7 +101,7 @@ VTestRecord Properties(bool i_bNew, const std::vector<std::pair<std::string, VNu
 	VTestRecord list = Record(i_bNew ? "Properties70" : "Properties60", {});
 	for (const auto& [name, numbers] : i_rProperties)
 	{
-		std::vector<VTestValue> values{name, std::string("Color"), std::string()};
+		std::vector<VTestValue> values{name, std::string(numbers.size() == 1 ? "Number" : "Color"), std::string()};
 		if (i_bNew)
 			values.push_back(std::string("A"));
 		values.insert(values.end(), numbers.begin(), numbers.end());
@@ -133,7 +133,7 @@ void AddMaterials(VObjects& io_rObjects, const VTestMesh& i_rMesh)
 
 } // namespace
 
-std::string FbxTest::Write(
+std::vector<VTestRecord> FbxTest::Records(
     const VTestForm& i_rForm, const VTestScene& i_rScene, const std::vector<VTestMesh>& i_rMeshes)
 {
 	VObjects objects(i_rForm, i_rScene);
@@ -189,5 +189,5 @@ std::string FbxTest::Write(
 				objects.Connect(objects.NodeKey(rCluster.m_Node), cluster);
 		}
 	}
-	return Write(i_rForm, objects.All());
+	return std::move(objects.All());
 }

@@ -53,6 +53,13 @@ struct VTestMesh
 	std::vector<VTestCluster> m_Clusters;
 };
 
-std::string Write(const VTestForm& i_rForm, const VTestScene& i_rScene, const std::vector<VTestMesh>& i_rMeshes);
+/// The records of the scene with its meshes as that version has them.
+std::vector<VTestRecord> Records(
+    const VTestForm& i_rForm, const VTestScene& i_rScene, const std::vector<VTestMesh>& i_rMeshes);
+
+inline std::string Write(const VTestForm& i_rForm, const VTestScene& i_rScene, const std::vector<VTestMesh>& i_rMeshes)
+{
+	return Write(i_rForm, Records(i_rForm, i_rScene, i_rMeshes));
+}
 
 } // namespace FbxTest

@@ -120,7 +120,7 @@ const VTexCoordRow c_TexCoordRows[]{
         {0, 1, 2, 3, 4, 5}, {}},
     {"IndicesOutOfRange", {"ByPolygonVertex", "IndexToDirect", {0, 0, 1, 0, 1, 1}, {0, 1, 2, 0, 77, -1}},
         {{0, 0, 0, 0}, {20, 0, 1, 0}, {20, 20, 1, 1}, {20, 20, 0, 0}, {0, 20, 0, 0}}, {0, 1, 2, 0, 3, 4},
-        {{3, "2 polygon vertices of mesh body have no texture coordinate"}}},
+        {{3, "2 vertices of mesh body have no texture coordinate"}}},
     {"OtherMappingsAreNone", {"ByPolygon", "Direct", {1, 1, 1, 1}, {}},
         {{0, 0, 0, 0}, {20, 0, 0, 0}, {20, 20, 0, 0}, {0, 20, 0, 0}}, {0, 1, 2, 0, 2, 3}, {}},
 };
@@ -205,7 +205,7 @@ TEST_P(Mesh, DamageIsToldAndLeftOut)
 	    (VMessages{{3,
 	                   "Polygons left out of mesh " + owner
 	                       + " because they have no end or name control points that do not exist: 2"},
-	        {3, "1 control points of mesh body have coordinates that are no numbers; setting these to zero"}}));
+	        {3, "1 control points of mesh body have coordinates or normals that are no numbers; setting these to zero"}}));
 }
 
 TEST(MeshArrays, DamageIsToldAndLeavesTheMeshEmpty)

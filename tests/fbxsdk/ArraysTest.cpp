@@ -7,7 +7,7 @@
 
 #include <numeric>
 
-using namespace FbxFile;
+using namespace FbxFormat;
 using namespace FbxTest;
 using namespace std::string_literals;
 

@@ -9,20 +9,11 @@
 
 #include <gtest/gtest.h>
 
-#include <random>
-
 using namespace FbxTest;
 using namespace std::string_literals;
 
 namespace
 {
-
-VTestScene SmallScene()
-{
-	return {{{"hips", "LimbNode", -1, {{"Lcl Translation", {1, 2, 3}}}},
-	            {"knee", "LimbNode", 0, {{"RotationOrder", {2}}}}, {"foot", "LimbNode", 1, {}}},
-	    {{"UpAxis", {2}}}, {}, {}};
-}
 
 struct VResult
 {
@@ -62,53 +53,6 @@ VResult Load(const std::string& i_rBytes)
 	return result;
 }
 
-/// Where a file has told what it is.
-std::size_t VersionEnd(const std::string& i_rBytes)
-{
-	return i_rBytes.starts_with(';') ? i_rBytes.find("EncryptionType") : 27;
-}
-
-class Damage : public testing::TestWithParam<VTestForm>
-{
-};
-
-TEST_P(Damage, CutAnywhereIsToldAsIncomplete)
-{
-	const std::string bytes = Write(GetParam(), SmallScene());
-	// Behind this stands nothing that is read: the footer, or a last end of line.
-	const std::size_t end = GetParam().m_Form == EForm::Binary ? bytes.size() - 40 : bytes.size() - 1;
-	const std::size_t versionEnd = VersionEnd(bytes);
-	for (std::size_t size = 0; size <= bytes.size(); ++size)
-	{
-		const VResult result = Load(bytes.substr(0, size));
-		EXPECT_EQ(result.m_bComplete, size >= end) << size;
-		EXPECT_TRUE(result.m_bInitialized || size < versionEnd) << size;
-		EXPECT_TRUE(result.m_Nodes == 4 || size < end) << size;
-	}
-}
-
-TEST_P(Damage, RandomBytesNeverBreakTheReader)
-{
-	const std::string bytes = Write(GetParam(), SmallScene());
-	const std::size_t start = VersionEnd(bytes);
-	std::mt19937 generator(11);
-	int incomplete = 0;
-	for (int round = 0; round < 3000; ++round)
-	{
-		std::string damaged = bytes;
-		for (int i = generator() % 4; i >= 0; --i)
-			damaged[start + generator() % (bytes.size() - start)] = char(generator() % 3 == 0 ? 0xFF : generator());
-		const VResult result = Load(damaged);
-		EXPECT_TRUE(result.m_bInitialized);
-		EXPECT_LE(result.m_Nodes, 5);
-		incomplete += !result.m_bComplete;
-	}
-	EXPECT_GT(incomplete, 300);
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Forms, Damage, testing::ValuesIn(c_Forms), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
-
 /// What a hostile MiB can hold most of: all of it must stay linear.
 TEST(Damage, AMillionBytesOfAnythingAreReadInOneGo)
 {
@@ -145,7 +89,7 @@ TEST(Damage, ListsAreBounded)
 		return text;
 	};
 	std::string nodes, connections;
-	for (std::size_t i = 1; i <= FbxFile::Limits::c_Nodes + 1; ++i)
+	for (std::size_t i = 1; i <= FbxFormat::Limits::c_Nodes + 1; ++i)
 	{
 		const std::string number = std::to_string(i);
 		nodes.append("Model: ").append(number).append(",\"Model::a\",\"Null\"\n");
@@ -153,16 +97,16 @@ TEST(Damage, ListsAreBounded)
 	}
 	const VResult result = Load(head + "Objects: {\n" + nodes + "}\nConnections: {\n" + connections + "}\n");
 	EXPECT_FALSE(result.m_bComplete);
-	EXPECT_EQ(result.m_Nodes, int(FbxFile::Limits::c_Nodes) + 1);
+	EXPECT_EQ(result.m_Nodes, int(FbxFormat::Limits::c_Nodes) + 1);
 	const auto objects = [&](std::size_t i_Count)
 	{ return Load(head + "Objects: {\n" + count(i_Count, "Pose: 7,\"\"\n") + "}\nConnections: {\n}\n").m_bComplete; };
-	EXPECT_TRUE(objects(FbxFile::Limits::c_Objects));
-	EXPECT_FALSE(objects(FbxFile::Limits::c_Objects + 1));
+	EXPECT_TRUE(objects(FbxFormat::Limits::c_Objects));
+	EXPECT_FALSE(objects(FbxFormat::Limits::c_Objects + 1));
 	const auto records = [&](std::size_t i_Count)
 	{ return Load(head + "Objects: {\n}\nConnections: {\n}\n" + count(i_Count, "A:1\n")).m_bComplete; };
 	// The root and the two sections are records too.
-	EXPECT_TRUE(records(FbxFile::Limits::c_Records - 3));
-	EXPECT_FALSE(records(FbxFile::Limits::c_Records - 2));
+	EXPECT_TRUE(records(FbxFormat::Limits::c_Records - 3));
+	EXPECT_FALSE(records(FbxFormat::Limits::c_Records - 2));
 }
 
 } // namespace

@@ -14,9 +14,9 @@ namespace
 template <typename T>
 std::string BinaryArray(char i_Type, const std::vector<T>& i_rNumbers)
 {
-	const std::string deflated =
-	    Deflate({reinterpret_cast<const char*>(i_rNumbers.data()), sizeof(T) * i_rNumbers.size()});
-	return Bytes(i_Type, std::uint32_t(i_rNumbers.size()), 1u, std::uint32_t(deflated.size()), deflated);
+	return PackedArray(i_Type, i_rNumbers.size(), true,
+	    {reinterpret_cast<const char*>(i_rNumbers.data()), sizeof(T) * i_rNumbers.size()})
+	    .m_Bytes;
 }
 
 std::string BinaryValue(const VTestValue& i_rValue)
@@ -77,13 +77,14 @@ public:
 			++count;
 		}
 		const std::size_t start = m_Bytes.size();
-		Header(0, count, values.size(), i_rRecord.m_Name);
+		const auto& [endLie, countLie, sizeLie, nameLie] = i_rRecord.m_Lies;
+		Header(0, count + countLie, values.size() + sizeLie, i_rRecord.m_Name, char(nameLie));
 		m_Bytes += values;
 		for (const VTestRecord& rChild : i_rRecord.m_Children)
 			Write(rChild);
 		if (!i_rRecord.m_Children.empty())
 			Header(0, 0, 0, {});
-		const std::string end = Number(m_Bytes.size());
+		const std::string end = Number(m_Bytes.size() + endLie);
 		m_Bytes.replace(start, end.size(), end);
 	}
 
@@ -100,9 +101,10 @@ private:
 		return m_Version >= 7500 ? Bytes(std::uint64_t(i_Number)) : Bytes(std::uint32_t(i_Number));
 	}
 
-	void Header(std::size_t i_End, std::size_t i_Count, std::size_t i_Size, const std::string& i_rName)
+	void Header(
+	    std::size_t i_End, std::size_t i_Count, std::size_t i_Size, const std::string& i_rName, char i_NameLie = 0)
 	{
-		m_Bytes += Bytes(Number(i_End), Number(i_Count), Number(i_Size), char(i_rName.size()), i_rName);
+		m_Bytes += Bytes(Number(i_End), Number(i_Count), Number(i_Size), char(i_rName.size() + i_NameLie), i_rName);
 	}
 
 	std::uint32_t m_Version;
@@ -148,6 +150,8 @@ void WriteText(
 			io_rText += array(*pIntegers, pIntegers->size());
 		else if (const auto* const pText = std::get_if<std::string>(&rValue))
 			io_rText += '"' + *pText + '"';
+		else
+			io_rText += std::get<VRaw>(rValue).m_Bytes;
 	}
 	if (!i_rRecord.m_Children.empty())
 	{
@@ -249,6 +253,12 @@ std::vector<VTestRecord> FbxTest::Records(const VTestForm& i_rForm, const VTestS
 	records.push_back(objects);
 	records.push_back(connections);
 	return records;
+}
+
+VRaw FbxTest::PackedArray(char i_Type, std::size_t i_Count, bool i_bDeflated, const std::string& i_rNumbers)
+{
+	const std::string packed = i_bDeflated ? Deflate(i_rNumbers) : i_rNumbers;
+	return {Bytes(i_Type, std::uint32_t(i_Count), std::uint32_t(i_bDeflated), std::uint32_t(packed.size()), packed)};
 }
 
 std::string FbxTest::Deflate(const std::string& i_rBytes)

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <string>
 #include <type_traits>
@@ -14,7 +15,7 @@ namespace FbxTest
 /// Written as a deflated array in binary and as "*n { a: }" in text; before version 7 as a list of values.
 using VNumbers = std::vector<double>;
 using VIntegers = std::vector<std::int32_t>;
-/// Bytes that go into a binary file as they stand, type byte included.
+/// Bytes that go into a file as they stand; in a binary one type byte included.
 struct VRaw
 {
 	std::string m_Bytes;
@@ -26,6 +27,9 @@ struct VTestRecord
 	std::string m_Name;
 	std::vector<VTestValue> m_Values;
 	std::vector<VTestRecord> m_Children;
+	/// What a binary file adds to the four numbers of the record's header: end, count and size of values, name's
+	/// length.
+	std::array<std::uint64_t, 4> m_Lies{};
 };
 
 enum class EForm
@@ -74,6 +78,9 @@ inline std::string Write(const VTestForm& i_rForm, const VTestScene& i_rScene)
 {
 	return Write(i_rForm, Records(i_rForm, i_rScene));
 }
+
+/// An array of a binary file that claims this count.
+VRaw PackedArray(char i_Type, std::size_t i_Count, bool i_bDeflated, const std::string& i_rNumbers);
 
 /// A zlib stream.
 std::string Deflate(const std::string& i_rBytes);

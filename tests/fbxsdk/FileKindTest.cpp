@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-using namespace FbxFile;
+using namespace FbxFormat;
 using namespace std::string_literals;
 
 namespace

@@ -40,7 +40,7 @@ std::map<std::string, VBounds> PlacedBounds(const std::string& i_rPath)
 	}
 	pManager->Destroy();
 
-	using namespace FbxFile;
+	using namespace FbxFormat;
 	VFileBytes bytes;
 	std::string reason;
 	EXPECT_TRUE(bytes.Read(i_rPath, std::numeric_limits<std::size_t>::max(), reason)) << reason;

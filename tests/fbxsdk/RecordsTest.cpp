@@ -7,7 +7,7 @@
 
 #include <gtest/gtest.h>
 
-using namespace FbxFile;
+using namespace FbxFormat;
 using namespace FbxTest;
 using namespace std::string_literals;
 

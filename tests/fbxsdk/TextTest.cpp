@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-using namespace FbxFile;
+using namespace FbxFormat;
 using namespace std::string_literals;
 
 namespace

@@ -7,7 +7,7 @@
 
 #include <random>
 
-using namespace FbxFile;
+using namespace FbxFormat;
 using Eigen::Affine3d;
 using Eigen::Matrix3d;
 using Eigen::Vector3d;

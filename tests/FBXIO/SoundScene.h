@@ -1,0 +1,108 @@
+#pragma once
+
+#include "FBXIO/FBXReader.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstring>
+
+/// What holds of every scene that is accepted, whatever was in the file.
+namespace FbxTest
+{
+
+template <typename TNumbers>
+bool AreFinite(const TNumbers& i_rNumbers)
+{
+	return std::all_of(
+	    std::begin(i_rNumbers), std::end(i_rNumbers), [](float i_Number) { return std::isfinite(i_Number); });
+}
+
+inline bool IsFinite(const QMatrix4x4& i_rMatrix)
+{
+	return std::all_of(
+	    i_rMatrix.constData(), i_rMatrix.constData() + 16, [](float i_Entry) { return std::isfinite(i_Entry); });
+}
+
+inline std::string UnsoundBone(const FBXIO::VSkinSkeleton& i_rSkeleton)
+{
+	for (const FBXIO::VSkinBone& rBone : i_rSkeleton)
+	{
+		if (rBone.m_ParentIndex < -1 || rBone.m_ParentIndex >= &rBone - i_rSkeleton.data())
+			return "the parent of " + rBone.m_Name + " does not stand before it";
+		for (const QMatrix4x4* const pMatrix :
+		    {&rBone.m_PreRotation, &rBone.m_InverseBind, &rBone.m_Local, &rBone.m_Global})
+			if (!IsFinite(*pMatrix))
+				return "a matrix of " + rBone.m_Name + " is not finite";
+	}
+	return {};
+}
+
+template <typename TVertex>
+std::string UnsoundMesh(const FBXIO::VMesh<TVertex>& i_rMesh, std::size_t i_Bones)
+{
+	if (i_rMesh.m_Parts.empty())
+		return "a mesh has no part";
+	for (const FBXIO::VMeshPart& rPart : i_rMesh.m_Parts)
+	{
+		for (const QVector4D& rColour : {rPart.m_Emissive, rPart.m_Ambient, rPart.m_Diffuse, rPart.m_Specular,
+		         rPart.m_Transparent, rPart.m_Reflection, QVector4D(rPart.m_Shininess, 0, 0, 0)})
+			for (int i = 0; i < 4; ++i)
+				if (!std::isfinite(rColour[i]))
+					return "a colour is not finite";
+		if (rPart.m_IndexSize != (i_rMesh.m_Vertices.size() < 65536 ? 2 : 4)
+		    || rPart.m_Indices.size() % (3 * rPart.m_IndexSize) != 0)
+			return "the size of the indices is wrong";
+		for (std::size_t at = 0; at < rPart.m_Indices.size(); at += rPart.m_IndexSize)
+		{
+			std::uint32_t index = 0;
+			std::memcpy(&index, rPart.m_Indices.data() + at, rPart.m_IndexSize);
+			if (index >= i_rMesh.m_Vertices.size())
+				return "an index names no vertex";
+		}
+	}
+	for (const TVertex& rVertex : i_rMesh.m_Vertices)
+	{
+		if (!AreFinite(rVertex.m_Position) || !AreFinite(rVertex.m_Normal) || !AreFinite(rVertex.m_TexCoord))
+			return "a vertex is not finite";
+		if constexpr (std::is_same_v<TVertex, FBXIO::VSkinVertex>)
+		{
+			const auto& [a, b, c, d] = rVertex.m_BoneWeights;
+			if (a + b + c + d > 255
+			    || !std::is_sorted(std::rbegin(rVertex.m_BoneWeights), std::rend(rVertex.m_BoneWeights)))
+				return "the weights of a vertex are too large, or not in order";
+			for (const std::uint8_t bone : rVertex.m_BoneIndices)
+				if (bone >= std::max<std::size_t>(i_Bones, 1))
+					return "a vertex names no bone";
+		}
+	}
+	return {};
+}
+
+/// Reads all that the file has; empty if everything is as it must be, else what is not.
+inline std::string WhatIsUnsound(FBXIO::FBXReader& io_rReader)
+{
+	std::string what = io_rReader.HasSkeleton() ? UnsoundBone(*io_rReader.GetSkeleton()) : std::string();
+	if (!std::isfinite(io_rReader.GetUnitScale()) || io_rReader.GetUnitScale() <= 0.0f)
+		what = "the unit is no length";
+	std::vector<FBXIO::VPlacedMesh> placed;
+	io_rReader.ReadPlacedMeshes(placed);
+	for (const FBXIO::VPlacedMesh& rPlaced : placed)
+	{
+		if (what.empty())
+			what = UnsoundMesh(rPlaced.m_Mesh, 0);
+		if (what.empty() && !IsFinite(rPlaced.m_Transform))
+			what = "the place of " + rPlaced.m_Name + " is not finite";
+	}
+	FBXIO::VSkin skin;
+	io_rReader.ReadSkin(skin);
+	if (what.empty() && skin.m_pSkeleton)
+		what = UnsoundBone(*skin.m_pSkeleton);
+	if (what.empty() && bool(skin.m_pSkeleton) != io_rReader.HasSkeleton())
+		what = "the skin has no skeleton";
+	for (const FBXIO::VSkinMesh& rMesh : skin.m_Meshes)
+		if (what.empty())
+			what = UnsoundMesh(rMesh, skin.m_pSkeleton->size());
+	return what;
+}
+
+} // namespace FbxTest
