@@ -222,6 +222,7 @@ TEST_P(ShaderLibrary, TellsWhereAFileIsWrong)
 	EXPECT_EQ(log.m_Messages[0].substr(0, start.size()), start);
 	// The third line of the file, whatever stands before it.
 	EXPECT_NE(log.m_Messages[0].find("0:3("), std::string::npos) << log.m_Messages[0];
+	EXPECT_EQ(log.m_Messages[0].find("1:"), std::string::npos);
 	const std::vector<std::string> names = library.GetFragmentShaderNames();
 	EXPECT_EQ(std::count(names.begin(), names.end(), "Note"), 0);
 	// A shader that is empty makes an empty program, without a second message.
@@ -247,11 +248,23 @@ TEST_P(ShaderLibrary, FilesOfADeveloperComeFirstAndAreReloadedInPlace)
 	EXPECT_EQ(mine.LocationIn(*pProgram), -1);
 	EXPECT_NE(other.LocationIn(*pProgram), -1);
 
-	QFile::remove(path);
 	VLog log;
+	Write(path, "void main() { gl_FragColor = vec4(Mine()); }\n");
 	library.Reload();
 	EXPECT_TRUE(pProgram->IsEmpty());
-	EXPECT_EQ(log.m_Messages, std::vector<std::string>{"Failed to open " + path.toStdString()});
+	QDir(folder.Path("")).mkdir("Shared");
+	Write(folder.Path("Shared/Fragment.glsl"), "float Mine()\n{\n	return 1.0;\n}\n");
+	library.Reload();
+	EXPECT_FALSE(pProgram->IsEmpty()) << "what is shared is the developer's too";
+	Write(folder.Path("Shared/Fragment.glsl"), "float Mine()\n{\n	return wrong;\n}\n");
+	library.Reload();
+	ASSERT_EQ(log.m_Messages.size(), 2u);
+	EXPECT_NE(log.m_Messages[1].find("1:3("), std::string::npos) << "and told as another file: " << log.m_Messages[1];
+
+	QFile::remove(path);
+	library.Reload();
+	EXPECT_TRUE(pProgram->IsEmpty());
+	EXPECT_EQ(log.m_Messages.back(), "Failed to open " + path.toStdString());
 }
 
 TEST_P(ShaderLibrary, IsMadeAgainInAContextThatSharesNothing)
@@ -284,10 +297,9 @@ TEST_P(ShaderLibrary, HeaderNamesTheLanguage)
 	ASSERT_FALSE(shader.IsEmpty());
 	const bool bES = GetParam() == EDialect::ES2;
 	const std::string source = shader.Get()->sourceCode().toStdString();
-	const std::string header = VShader::Header(bES);
-	EXPECT_EQ(header,
+	EXPECT_EQ(VShader::Header(bES, "shared\n"),
 	    std::string(bES ? "#version 100\n" : "#version 120\n") + "#ifdef GL_ES\nprecision mediump float;\n#endif\n"
-	        + (bES ? "#line 1\n" : "#line 0\n"));
+	        + (bES ? "#line 1 1\nshared\n#line 1 0\n" : "#line 0 1\nshared\n#line 0 0\n"));
 	EXPECT_NE(source.find(bES ? "#version 100" : "#version 120"), std::string::npos);
 }
 

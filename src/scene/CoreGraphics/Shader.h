@@ -27,8 +27,9 @@ public:
 	/// Compiles the file as it is now, in the context that is current now.
 	void Compile();
 
-	/// What stands before the text of every file: the language's version, and lines that count from the file's first.
-	static const char* Header(bool i_bOpenGLES);
+	/// What stands before the text of every file: the language's version, what all shaders of its type share, and lines
+	/// that count from the file's first.
+	static std::string Header(bool i_bOpenGLES, const std::string& i_rShared);
 
 	bool IsEmpty() const { return !m_pShader; }
 	EShaderType Type() const { return m_Type; }

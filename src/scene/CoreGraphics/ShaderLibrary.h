@@ -23,7 +23,7 @@ public:
 	{
 		/// Shaders come from the source folders first, and Reload works.
 		bool m_bDevelopment = false;
-		/// Folders that hold "VertexShaders" and "FragmentShaders".
+		/// Folders that hold "VertexShaders" and "FragmentShaders", and may hold "Shared".
 		std::vector<std::string> m_SourceFolders;
 		/// The folder that holds "Geometry"; looked for beside the binary if empty.
 		std::string m_ResourceRoot;

@@ -1,8 +1,4 @@
 // A material of an FBX file, lit from above, from the eye, a little from the floor, and round its edge.
-const float c_Ambience = 0.2;
-const float c_Bounce = 0.2;
-const float c_Top = 0.8;
-const float c_Camera = 0.5;
 const float c_RimPower = 4.0;
 const float c_RimFactor = 0.25;
 // The least that is raised to a power.
@@ -28,11 +24,6 @@ varying vec3 v_Normal;
 varying vec3 v_Eye;
 varying vec2 v_UV;
 
-float Diffuse(vec3 i_Normal, vec3 i_ToLight)
-{
-	return max(dot(i_Normal, i_ToLight), 0.0);
-}
-
 vec3 DiffuseColour()
 {
 	if (u_DiffuseTextureEnabled)
@@ -49,11 +40,10 @@ void main()
 {
 	vec3 normal = normalize(v_Normal);
 	vec3 eye = normalize(v_Eye);
-	vec3 toCamera = vec3(u_View[0][2], u_View[1][2], u_View[2][2]);
+	vec3 toCamera = ToCamera(u_View);
 	// The eye's light fades where it would fall together with the top's.
 	float cameraScale = max(0.0, 1.0 - dot(toCamera, u_Up));
-	float light = Diffuse(normal, toCamera) * cameraScale * c_Camera + Diffuse(normal, -u_Up) * c_Bounce
-		+ Diffuse(normal, u_Up) * c_Top + c_Ambience;
+	float light = Light(normal, toCamera, u_Up, c_Lights * vec4(1.0, 1.0, 1.0, cameraScale));
 	float specular = pow(max(dot(reflect(eye, normal), u_LightVector), c_SpecularFloor), u_Shininess);
 	float rim = pow(max(1.0 - dot(-eye, normal), 0.0), c_RimPower) * c_RimFactor;
 	vec3 colour = v_Colour.rgb * DiffuseColour() * light + specular * u_SpecularColour.rgb * u_SpecularColour.a + rim

@@ -1,9 +1,4 @@
 // A force plate with a frame, lit like its surroundings.
-const float c_Ambience = 0.2;
-const float c_Bounce = 0.2;
-const float c_Top = 0.8;
-const float c_Camera = 0.5;
-
 uniform mat4 u_View;
 uniform vec3 u_Up;
 
@@ -11,17 +6,9 @@ varying vec4 v_Colour;
 varying vec3 v_Normal;
 varying vec2 v_UV;
 
-float Diffuse(vec3 i_Normal, vec3 i_ToLight)
-{
-	return max(dot(i_Normal, i_ToLight), 0.0);
-}
-
 void main()
 {
-	vec3 normal = normalize(v_Normal);
-	vec3 toCamera = vec3(u_View[0][2], u_View[1][2], u_View[2][2]);
-	float light = Diffuse(normal, toCamera) * c_Camera + Diffuse(normal, -u_Up) * c_Bounce
-		+ Diffuse(normal, u_Up) * c_Top + c_Ambience;
+	float light = Light(normalize(v_Normal), ToCamera(u_View), u_Up, c_Lights);
 	// Nearer to an edge than this is frame.
 	vec2 edge = min(v_UV, 1.0 - v_UV);
 	float frame = 1.0 - step(0.02, min(edge.x, edge.y));

@@ -1,8 +1,4 @@
 // A square that faces the eye, of a size in pixels, about a place in the world.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec2 u_ViewportSize;
 // Place, and size.

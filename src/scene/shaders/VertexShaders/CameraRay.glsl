@@ -1,8 +1,4 @@
 // A ray from a camera to what it sees: a_position.z goes from the one to the other.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec3 u_RayStart;
 uniform vec3 u_RayEnd;

@@ -1,8 +1,4 @@
 // A centroid in the picture of a camera: a unit square about the place that it was seen at, in pixels of the sensor.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform vec4 u_View2D;
 // Place, and radius.
 uniform vec3 u_Centroid;

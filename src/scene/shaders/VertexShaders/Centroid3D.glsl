@@ -1,8 +1,4 @@
 // On the sensor of a camera that stands in the scene, a plane at unit distance that the model's transform places.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform mat4 u_ModelTransform;
 uniform vec2 u_SensorSize;

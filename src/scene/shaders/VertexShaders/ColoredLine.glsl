@@ -1,8 +1,4 @@
 // A line in the colours of its ends, in world space; how far along it a pixel is counts in pixels.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec2 u_ViewportSize;
 

@@ -1,8 +1,4 @@
 // A skin on its bones: up to four a vertex.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec3 u_CameraPosition;
 // From where the skin was bound to where its bones are. Element (3, 3) is the health of the segment that moves the bone.

@@ -1,8 +1,4 @@
 // The floor: a unit square, spread to the extents (least x, least y, greatest x, greatest y).
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec3 u_Up;
 uniform vec3 u_CameraPosition;

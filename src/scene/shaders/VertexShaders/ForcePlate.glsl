@@ -1,9 +1,5 @@
 // A force plate, and the arrow of the force from where it acts: the vertices of the arrow, of length 1 along Z, have a
 // normal; those of the plate have none.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform mat4 u_ModelTransform;
 uniform vec4 u_ModelColour;

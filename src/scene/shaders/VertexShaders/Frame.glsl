@@ -1,8 +1,4 @@
 // The frame round a tile of the camera grid: a unit square, as wide and high as the sensor.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform vec4 u_View2D;
 uniform vec2 u_SensorSize;
 

@@ -1,8 +1,4 @@
 // A shape in the camera grid's 2D view, turned about a point. The view is a scale and then an offset.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform vec4 u_View2D;
 // In radians.
 uniform float u_Rotation;

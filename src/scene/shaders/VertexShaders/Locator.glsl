@@ -1,8 +1,4 @@
 // A cross of unit length about a place, with a size.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec4 u_ReconPosAndSize;
 uniform vec4 u_ModelColour;

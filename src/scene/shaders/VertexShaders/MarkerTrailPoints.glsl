@@ -1,8 +1,4 @@
 // Where a marker was and will be: points of the vertices' colours, of a size in pixels.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform float u_PointSize;
 

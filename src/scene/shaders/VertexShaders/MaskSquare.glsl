@@ -1,8 +1,4 @@
 // A square of a camera's mask, in pixels of the sensor.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform vec4 u_View2D;
 // Least corner, and size.
 uniform vec4 u_Square;

@@ -1,8 +1,4 @@
 // The unit sphere of a marker that is not seen, at a place, with a radius.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec4 u_ReconPosAndSize;
 uniform vec4 u_ModelColour;

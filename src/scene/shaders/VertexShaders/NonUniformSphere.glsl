@@ -1,8 +1,4 @@
 // A unit sphere under any transform.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform mat4 u_ModelTransform;
 uniform vec4 u_ModelColour;
@@ -11,16 +7,6 @@ attribute vec3 a_position;
 
 varying vec4 v_Colour;
 varying vec3 v_Normal;
-
-// Normals keep at right angles to their faces under any scale: the matrix of the cofactors.
-// Of length 1: numbers of medium precision, as fragment shaders have them, end at 65504.
-vec3 ToWorld(mat4 i_Model, vec3 i_Normal)
-{
-	vec3 x = i_Model[0].xyz;
-	vec3 y = i_Model[1].xyz;
-	vec3 z = i_Model[2].xyz;
-	return normalize(cross(y, z) * i_Normal.x + cross(z, x) * i_Normal.y + cross(x, y) * i_Normal.z);
-}
 
 void main()
 {

@@ -1,7 +1,4 @@
 // A sphere so small that it is a point, of the vertex's colour.
-#ifdef GL_ES
-precision highp float;
-#endif
 
 // Added to w: from far away the point would fight with the floor for the pixel.
 const float c_Nearer = 0.02;

@@ -1,7 +1,4 @@
 // Axes in a corner of the screen: the view's rotation alone, as far away as they are long.
-#ifdef GL_ES
-precision highp float;
-#endif
 
 // An axis as part of half the viewport, which leaves room at its edges.
 const float c_Length = 0.8;

@@ -1,8 +1,4 @@
 // In world space.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 
 attribute vec3 a_position;

@@ -1,8 +1,4 @@
 // The lines of a model, in the colours of its vertices.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform mat4 u_ModelTransform;
 

@@ -1,8 +1,4 @@
 // Points of a size in pixels, in world space.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform float u_PointSize;
 

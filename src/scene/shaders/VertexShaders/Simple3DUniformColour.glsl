@@ -1,8 +1,4 @@
 // One colour, in world space.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec4 u_ModelColour;
 

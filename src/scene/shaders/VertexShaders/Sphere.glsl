@@ -1,8 +1,4 @@
 // A unit sphere at a place, with a radius.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec4 u_ReconPosAndSize;
 uniform vec4 u_ModelColour;

@@ -1,8 +1,4 @@
 // A unit cylinder between two markers, from the one's colour to the other's.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform mat4 u_ModelTransform;
 uniform vec4 u_StickColourA;

@@ -1,8 +1,4 @@
 // The shadow of a stick on the floor.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec3 u_Up;
 uniform vec3 u_LightVector;

@@ -1,8 +1,4 @@
 // A unit cube at a place, with the length of an edge.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform mat4 u_ViewProjection;
 uniform vec4 u_TargetPosAndSize;
 uniform vec4 u_ModelColour;

@@ -1,8 +1,4 @@
 // The trail of a wand in a camera's picture, in pixels of the sensor; uv.x is the age of each point.
-#ifdef GL_ES
-precision highp float;
-#endif
-
 uniform vec4 u_View2D;
 
 attribute vec2 a_position;
