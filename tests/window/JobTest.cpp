@@ -1,76 +1,19 @@
 // The whole job at the window, by mouse and keyboard alone: from two files to a saved retarget subject.
 
-#include "Operator.h"
+#include "WindowFixture.h"
 
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexTypes/TextForm.h"
-#include "studio/Preferences.h"
-#include "studio/RetargetPanel.h"
 #include "studio/Services.h"
-#include "studio/StudioWindow.h"
 
-#include <gtest/gtest.h>
-
-#include <QApplication>
 #include <QFile>
-#include <QProcess>
-#include <QQuickWidget>
-#include <QTemporaryDir>
-#include <QTest>
 
 namespace
 {
 
-class Window : public testing::Test
+class Job : public Window
 {
 protected:
-	static void SetUpTestSuite()
-	{
-		static int s_Count = 1;
-		static char s_Name[] = "test";
-		static char* s_pArguments[] = {s_Name, nullptr};
-		s_pApplication = new QApplication(s_Count, s_pArguments);
-	}
-	static void TearDownTestSuite() { delete s_pApplication; }
-
-	void SetUp() override
-	{
-		const std::string folder = m_Folder.path().toStdString();
-		QFile::copy(RETARGET_SOURCE "/demo/performer.qrs", m_Folder.filePath("performer.qrs"));
-		QFile::copy(RETARGET_SOURCE "/demo/character.fbx", m_Folder.filePath("character.fbx"));
-		m_pSettings = std::make_unique<QSettings>(m_Folder.filePath("studio.ini"), QSettings::IniFormat);
-		m_pWindow = std::make_unique<StudioHost::VStudioWindow>(*m_pSettings);
-		for (const char* const pKey : {"FolderSubjects", "FolderSkins", "FolderRetargets"})
-			m_pWindow->Context().Preferences().SetFolder(pKey, folder);
-		ASSERT_TRUE(m_pWindow->LoadModule(RETARGET_MODULE));
-		m_pWindow->resize(1280, 800);
-		m_pWindow->show();
-		m_pWindow->activateWindow();
-		ASSERT_TRUE(QTest::qWaitForWindowActive(m_pWindow.get()));
-		auto* const pPanel = qobject_cast<QQuickWidget*>(m_pWindow->RetargetPanel()->Widget());
-		ASSERT_TRUE(pPanel && pPanel->rootObject());
-		m_pOperator = std::make_unique<VOperator>(*m_pWindow, *pPanel);
-	}
-
-	QString File(const char* i_pName) const { return m_Folder.filePath(i_pName); }
-
-	QByteArray Content(const char* i_pName) const
-	{
-		QFile file(File(i_pName));
-		EXPECT_TRUE(file.open(QIODevice::ReadOnly)) << i_pName;
-		return file.readAll();
-	}
-
-	/// What the command line writes for the same edits.
-	QByteArray CommandLine(const QStringList& i_rArguments)
-	{
-		QProcess process;
-		process.start(RETARGET_PROGRAM, QStringList{"-q"} + i_rArguments + QStringList{"-o", File("expected.qrr")});
-		EXPECT_TRUE(process.waitForFinished(60000));
-		EXPECT_EQ(process.exitCode(), 0) << process.readAllStandardError().toStdString();
-		return Content("expected.qrr");
-	}
-
 	/// A subject of one target as programs of old wrote it.
 	QByteArray LegacyFile()
 	{
@@ -87,34 +30,15 @@ protected:
 		return "[[1,0,1],\"\"]" + QByteArray::fromStdString(text);
 	}
 
-	int RowOf(const char* i_pList, const char* i_pName) const
-	{
-		QObject* const pModel = m_pOperator->Property(i_pList, "model").value<QObject*>();
-		const auto* const pItems = qobject_cast<QAbstractItemModel*>(pModel);
-		for (int row = 0; pItems && row < pItems->rowCount(); ++row)
-			if (pItems->data(pItems->index(row, 0), Qt::UserRole + 1).toString() == i_pName)
-				return row;
-		ADD_FAILURE() << i_pName;
-		return 0;
-	}
 	void SelectPair(const char* i_pSource, const char* i_pTarget)
 	{
 		m_pOperator->ClickRow("sourceSegments", RowOf("sourceSegments", i_pSource));
 		m_pOperator->ClickRow("targetSegments", RowOf("targetSegments", i_pTarget));
 		EXPECT_EVENTUALLY(m_pOperator->Property("addPositionTarget", "enabled").toBool());
 	}
-	int Targets() const { return m_pOperator->Property("targets", "count").toInt(); }
-
-	static QApplication* s_pApplication;
-	QTemporaryDir m_Folder;
-	std::unique_ptr<QSettings> m_pSettings;
-	std::unique_ptr<StudioHost::VStudioWindow> m_pWindow;
-	std::unique_ptr<VOperator> m_pOperator;
 };
 
-QApplication* Window::s_pApplication = nullptr;
-
-TEST_F(Window, TheWholeJob)
+TEST_F(Job, TheWholeJob)
 {
 	VOperator& rOperator = *m_pOperator;
 	rOperator.Choose("SourceSkeleton", "performer");
@@ -198,13 +122,10 @@ TEST_F(Window, TheWholeJob)
 	EXPECT_TRUE(Content("job.qrr") == saved);
 }
 
-TEST_F(Window, SelectsWithMouseAndKeys)
+TEST_F(Job, SelectsWithMouseAndKeys)
 {
 	VOperator& rOperator = *m_pOperator;
-	rOperator.Choose("SourceSkeleton", "performer");
-	rOperator.Choose("TargetFBX", "character");
-	EXPECT_EVENTUALLY(rOperator.Property("TargetRoot", "currentText").toString() == "haunch");
-	rOperator.Click("createTargetSubject");
+	CreateTargetSubject();
 
 	int other = -1;
 	for (const QString& rList : {QStringLiteral("sourceSegments"), QStringLiteral("targetSegments")})
@@ -247,7 +168,7 @@ TEST_F(Window, SelectsWithMouseAndKeys)
 	EXPECT_EVENTUALLY(rOperator.Property("jointSymmetry", "checked").toBool());
 }
 
-TEST_F(Window, ALegacyFileIsSavedUnderANewName)
+TEST_F(Job, ALegacyFileIsSavedUnderANewName)
 {
 	VOperator& rOperator = *m_pOperator;
 	const QByteArray legacy = LegacyFile();

@@ -7,7 +7,9 @@
 #include <QLineEdit>
 #include <QQuickItem>
 #include <QQuickWidget>
+#include <QScreen>
 #include <QTest>
+#include <QWheelEvent>
 #include <QWindow>
 
 namespace
@@ -35,7 +37,8 @@ QQuickItem* Top(QQuickItem* i_pItem)
 
 bool Eventually(const std::function<bool()>& i_rCondition)
 {
-	return QTest::qWaitFor(i_rCondition, 60000);
+	return QTest::qWaitFor(
+	    i_rCondition, qEnvironmentVariableIsSet("WAIT") ? qEnvironmentVariableIntValue("WAIT") : 60000);
 }
 
 VOperator::VOperator(QWidget& i_rWindow, QQuickWidget& i_rPanel) : m_rWindow(i_rWindow), m_rPanel(i_rPanel) {}
@@ -86,6 +89,69 @@ void VOperator::Hover(const QString& i_rName)
 		QTest::mouseMove(
 		    m_rWindow.windowHandle(), m_rPanel.mapTo(&m_rWindow, pItem->mapToScene(middle + rStep).toPoint()));
 	QTest::qWait(0);
+}
+
+QPoint VOperator::InWindow(const QPointF& i_rPlace) const
+{
+	return m_rPanel.mapTo(&m_rWindow, Item("scene")->mapToScene(i_rPlace).toPoint());
+}
+
+void VOperator::Point(const QPointF& i_rPlace, Qt::KeyboardModifiers i_Modifiers)
+{
+	QTest::mouseEvent(QTest::MouseMove, m_rWindow.windowHandle(), Qt::NoButton, i_Modifiers, InWindow(i_rPlace));
+	QTest::qWait(0);
+}
+
+void VOperator::Press(Qt::MouseButton i_Button, const QPointF& i_rPlace, Qt::KeyboardModifiers i_Modifiers)
+{
+	QTest::mousePress(m_rWindow.windowHandle(), i_Button, i_Modifiers, InWindow(i_rPlace));
+	QTest::qWait(0);
+}
+
+void VOperator::Release(Qt::MouseButton i_Button, const QPointF& i_rPlace, Qt::KeyboardModifiers i_Modifiers)
+{
+	QTest::mouseRelease(m_rWindow.windowHandle(), i_Button, i_Modifiers, InWindow(i_rPlace));
+	QTest::qWait(0);
+}
+
+void VOperator::ClickAt(const QPointF& i_rPlace, Qt::KeyboardModifiers i_Modifiers)
+{
+	Point(i_rPlace, i_Modifiers);
+	Press(Qt::LeftButton, i_rPlace, i_Modifiers);
+	Release(Qt::LeftButton, i_rPlace, i_Modifiers);
+}
+
+void VOperator::Drag(const QVector<Qt::MouseButton>& i_rButtons, const QPoint& i_rFrom, const QPoint& i_rTo,
+    Qt::KeyboardModifiers i_Modifiers)
+{
+	constexpr int c_Steps = 5;
+	for (const Qt::MouseButton button : i_rButtons)
+		Press(button, i_rFrom, i_Modifiers);
+	for (int i = 1; i <= c_Steps; ++i)
+		Point(i_rFrom + (i_rTo - i_rFrom) * i / c_Steps, i_Modifiers);
+	for (const Qt::MouseButton button : i_rButtons)
+		Release(button, i_rTo, i_Modifiers);
+}
+
+void VOperator::Wheel(int i_Notches)
+{
+	const QPoint place =
+	    InWindow({Property("scene", "width").toDouble() / 2, Property("scene", "height").toDouble() / 2});
+	for (int i = 0; i < std::abs(i_Notches); ++i)
+	{
+		QWheelEvent event(place, m_rWindow.mapToGlobal(place), {}, {0, i_Notches > 0 ? 120 : -120}, Qt::NoButton,
+		    Qt::NoModifier, Qt::NoScrollPhase, false);
+		QCoreApplication::sendEvent(m_rWindow.windowHandle(), &event);
+	}
+	QTest::qWait(0);
+}
+
+QImage VOperator::See(const QPointF& i_rPlace, int i_Reach) const
+{
+	const QPoint corner = InWindow(i_rPlace) - QPoint(i_Reach, i_Reach);
+	return m_rWindow.screen()
+	    ->grabWindow(m_rWindow.winId(), corner.x(), corner.y(), 2 * i_Reach + 1, 2 * i_Reach + 1)
+	    .toImage();
 }
 
 void VOperator::Key(int i_Key, Qt::KeyboardModifiers i_Modifiers)

@@ -1,8 +1,11 @@
 #pragma once
 
+#include <QImage>
+#include <QPointF>
 #include <QString>
 #include <QStringList>
 #include <QVariant>
+#include <QVector>
 
 #include <functional>
 
@@ -26,6 +29,19 @@ public:
 	void Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
 	void Hover(const QString& i_rName);
 
+	/// The mouse in the preview, at a place in its pixels.
+	void Point(const QPointF& i_rPlace, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+	void ClickAt(const QPointF& i_rPlace, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+	void Press(Qt::MouseButton i_Button, const QPointF& i_rPlace, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+	void Release(Qt::MouseButton i_Button, const QPointF& i_rPlace, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+	/// Buttons go down one after the other, the mouse moves in steps, and they go up again.
+	void Drag(const QVector<Qt::MouseButton>& i_rButtons, const QPoint& i_rFrom, const QPoint& i_rTo,
+	    Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+	/// Notches of the wheel, away from the user.
+	void Wheel(int i_Notches);
+	/// What stands on the screen around a place of the preview.
+	QImage See(const QPointF& i_rPlace, int i_Reach) const;
+
 	/// The keyboard, where the focus is.
 	void Key(int i_Key, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
 	void Type(const QString& i_rText);
@@ -48,6 +64,7 @@ public:
 
 private:
 	QWidget* Dialog() const;
+	QPoint InWindow(const QPointF& i_rPlace) const;
 	/// The dialog has closed, and the keyboard is the window's again.
 	bool ComeBack();
 

@@ -1,0 +1,224 @@
+// The preview by mouse: the camera, what it points at, and the manipulator, from two files to a saved pose. What is to
+// be seen is computed by the arithmetic of Eye.h.
+
+#include "Eye.h"
+#include "WindowFixture.h"
+
+#include <QFile>
+#include <QRegularExpression>
+
+namespace
+{
+
+constexpr double c_RingRadius = 50.0;
+
+class Preview : public Window
+{
+protected:
+	void SetUp() override
+	{
+		Window::SetUp();
+		CreateTargetSubject();
+		m_Source = ReadSkeleton(Run({"fk", File("performer.qrs")}));
+		m_Created = CommandLine(m_Edits);
+		m_Target = ReadSkeleton(Run({"fk", File("expected.qrr")}));
+		m_Eye.m_Size = {
+		    m_pOperator->Property("scene", "width").toDouble(), m_pOperator->Property("scene", "height").toDouble()};
+	}
+
+	QString ToolTip() const { return m_pOperator->Property("scene", "toolTipText").toString(); }
+
+	/// Points at the middle of a bone, and sees its name.
+	QPointF PointAtBone(const char* i_pName, const char* i_pEnd)
+	{
+		const bool bSource = m_Source.count(i_pName) != 0;
+		const VSkeleton& rSkeleton = bSource ? m_Source : m_Target;
+		const QPointF place =
+		    m_Eye.Project(0.5 * (rSkeleton.at(i_pName).translation() + rSkeleton.at(i_pEnd).translation()));
+		m_pOperator->Point({m_Eye.m_Size.width() - 3.0, 3.0});
+		EXPECT_EVENTUALLY(ToolTip().isEmpty()) << ToolTip().toStdString();
+		m_pOperator->Point(place);
+		const QString name = QString("Template : ") + i_pName;
+		EXPECT_EVENTUALLY(ToolTip() == name) << ToolTip().toStdString() << " instead of " << i_pName;
+		return place;
+	}
+
+	bool Selected(const char* i_pList, const char* i_pSegment) const
+	{
+		return m_pOperator->Property(i_pList, "selectedIndex").toInt() == RowOf(i_pList, i_pSegment);
+	}
+
+	/// The move of the mouse that turns the view until it looks against an axis.
+	QPoint TurnTo(const Eigen::Vector3d& i_rAxis) const
+	{
+		const double pitch = -std::acos(i_rAxis.z()) * 180.0 / M_PI;
+		const double yaw = 90.0 - std::atan2(i_rAxis.y(), i_rAxis.x()) * 180.0 / M_PI - 180.0;
+		return {qRound(std::remainder(yaw - m_Eye.m_Yaw, 360.0) / 0.2), qRound((pitch - m_Eye.m_Pitch) / 0.2)};
+	}
+
+	/// A place on the ring of the manipulator about one of its axes.
+	QPointF OnRing(const Eigen::Isometry3d& i_rHandle, int i_Axis, double i_Angle) const
+	{
+		Eigen::Vector3d place = Eigen::Vector3d::Zero();
+		place[(i_Axis + 1) % 3] = std::cos(i_Angle);
+		place[(i_Axis + 2) % 3] = std::sin(i_Angle);
+		return m_Eye.Project(i_rHandle * (c_RingRadius * m_Eye.PixelSize(i_rHandle.translation()) * place));
+	}
+
+	/// Drags a ring of the manipulator from one place on it to another and keeps the button down.
+	/// @return the turn in the world that this stands for
+	Eigen::Matrix3d DragRing(
+	    const Eigen::Isometry3d& i_rHandle, int i_Axis, double i_From, double i_To, QPointF& o_rEnd)
+	{
+		const QPointF start = OnRing(i_rHandle, i_Axis, i_From).toPoint();
+		m_pOperator->Point(start);
+		EXPECT_EVENTUALLY(Sees(start, IsYellow));
+		m_pOperator->Press(Qt::LeftButton, start);
+		constexpr int c_Steps = 6;
+		for (int i = 1; i <= c_Steps; ++i)
+			m_pOperator->Point(o_rEnd = OnRing(i_rHandle, i_Axis, i_From + (i_To - i_From) * i / c_Steps).toPoint());
+
+		const Eigen::Vector3d centre = i_rHandle.translation();
+		const Eigen::Vector3d axis = i_rHandle.linear().col(i_Axis);
+		// Counter-clockwise is right-handed about what points at the eye.
+		const double sign = axis.dot(m_Eye.Ray(start)) < 0.0 ? 1.0 : -1.0;
+		const double angle = sign * AngleOnScreen(m_Eye.Project(centre), start, o_rEnd);
+		// A ring that faces the eye stays under the mouse; of one that is seen aslant the angle on the screen counts.
+		const double facing = std::abs(axis.dot(m_Eye.Ray(m_Eye.Project(centre))));
+		EXPECT_NEAR(angle, AngleInPlane(m_Eye, centre, axis, start, o_rEnd), 0.002 + 1.0 - facing * facing);
+		return Exp(angle * axis);
+	}
+
+	static bool IsYellow(const QColor& i_rColour)
+	{
+		return i_rColour.red() > 120 && i_rColour.green() > 120 && i_rColour.blue() < 60;
+	}
+	static bool IsMagenta(const QColor& i_rColour)
+	{
+		return i_rColour.red() > 90 && i_rColour.green() < 60 && i_rColour.blue() > 90;
+	}
+	/// On the screen, a pixel or two beside a place.
+	bool Sees(const QPointF& i_rPlace, bool (*i_pIsColour)(const QColor&)) const
+	{
+		const QImage image = m_pOperator->See(i_rPlace, 2);
+		for (int y = 0; y < image.height(); ++y)
+			for (int x = 0; x < image.width(); ++x)
+				if (i_pIsColour(image.pixelColor(x, y)))
+					return true;
+		return false;
+	}
+
+	/// The directions in which a segment's joint turns when its pose is zero.
+	Eigen::Matrix3d JointFrame(const char* i_pSegment) const
+	{
+		return m_Target.at(i_pSegment).linear() * Exp(Pose(m_Created, i_pSegment)).transpose();
+	}
+
+	/// Of a segment's bind pose in a file.
+	static Eigen::Vector3d Pose(const QByteArray& i_rFile, const char* i_pSegment)
+	{
+		const QRegularExpression pattern(
+		    QString("NAME=\"%1\"[^>]*>\\s*<JointBall.*?BIND-POSE=\"(\\S+) (\\S+) (\\S+)\"").arg(i_pSegment),
+		    QRegularExpression::DotMatchesEverythingOption);
+		const QRegularExpressionMatch match = pattern.match(QString::fromUtf8(i_rFile));
+		EXPECT_TRUE(match.hasMatch()) << i_pSegment;
+		return {match.captured(1).toDouble(), match.captured(2).toDouble(), match.captured(3).toDouble()};
+	}
+	static QString Text(const Eigen::Vector3d& i_rVector)
+	{
+		return QString("%1,%2,%3")
+		    .arg(i_rVector.x(), 0, 'g', 17)
+		    .arg(i_rVector.y(), 0, 'g', 17)
+		    .arg(i_rVector.z(), 0, 'g', 17);
+	}
+
+	VEye m_Eye;
+	VSkeleton m_Source, m_Target;
+	QStringList m_Edits{"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs")};
+	QByteArray m_Created;
+};
+
+TEST_F(Preview, TheMainRoad)
+{
+	VOperator& rOperator = *m_pOperator;
+	PointAtBone("R_Radius", "R_Hand");
+	const auto drag = [&](const QVector<Qt::MouseButton>& i_rButtons, const QPoint& i_rMove)
+	{ rOperator.Drag(i_rButtons, QPoint(300, 400), QPoint(300, 400) + i_rMove); };
+	drag({Qt::LeftButton}, {-120, 30});
+	m_Eye.Orbit({-120, 30});
+	PointAtBone("R_Radius", "R_Hand");
+	drag({Qt::LeftButton, Qt::RightButton}, {40, 90});
+	m_Eye.Pan({40, 90});
+	PointAtBone("R_Radius", "R_Hand");
+	drag({Qt::RightButton}, {0, -150});
+	m_Eye.Dolly({0, -150});
+	PointAtBone("R_Radius", "R_Hand");
+	rOperator.Wheel(2);
+	m_Eye.m_Distance *= 0.9 * 0.9;
+
+	rOperator.ClickAt(PointAtBone("R_Radius", "R_Hand"));
+	EXPECT_EVENTUALLY(Selected("sourceSegments", "R_Radius"));
+	rOperator.ClickAt(PointAtBone("foreArmRight", "palmRight"), Qt::ShiftModifier);
+	EXPECT_EVENTUALLY(Selected("targetSegments", "foreArmRight"));
+	EXPECT_TRUE(Selected("sourceSegments", "R_Radius"));
+	EXPECT_EVENTUALLY(rOperator.Property("addPositionTarget", "enabled").toBool());
+	rOperator.Click("addPositionTarget");
+	EXPECT_EVENTUALLY(Targets() == 1);
+	rOperator.Key(Qt::Key_R, Qt::AltModifier);
+	EXPECT_EVENTUALLY(Targets() == 2);
+	m_Edits += {"--position", "R_Radius:foreArmRight", "--rotation", "R_Radius:foreArmRight"};
+
+	// The shoulder in the middle, and the ring about its third axis as a circle.
+	rOperator.ClickAt(PointAtBone("upperArmLeft", "foreArmLeft"));
+	EXPECT_EVENTUALLY(Selected("targetSegments", "upperArmLeft"));
+	EXPECT_EVENTUALLY(!Selected("sourceSegments", "R_Radius")) << "replaced";
+	rOperator.Key(Qt::Key_F, Qt::ControlModifier);
+	Eigen::Isometry3d arm = m_Target.at("upperArmLeft");
+	m_Eye.Frame(arm.translation());
+	PointAtBone("upperArmLeft", "foreArmLeft");
+	const QPoint turn = TurnTo(arm.linear().col(2));
+	drag({Qt::LeftButton}, turn);
+	m_Eye.Orbit(turn);
+	drag({Qt::RightButton}, {0, 120});
+	m_Eye.Dolly({0, 120});
+
+	const Eigen::Matrix3d frame = JointFrame("upperArmLeft"), otherFrame = JointFrame("upperArmRight");
+	Eigen::Isometry3d otherArm = m_Target.at("upperArmRight");
+	const Eigen::Vector3d elbow = (arm.inverse() * m_Target.at("foreArmLeft")).translation();
+	const Eigen::Vector3d otherElbow = (otherArm.inverse() * m_Target.at("foreArmRight")).translation();
+	const Eigen::Vector3d normal = (arm.translation() - otherArm.translation()).normalized();
+	const Eigen::Matrix3d mirror = Eigen::Matrix3d::Identity() - 2.0 * normal * normal.transpose();
+	QPointF end;
+	for (const int axis : {2, 1})
+	{
+		SCOPED_TRACE(axis);
+		arm.linear() = DragRing(arm, axis, 0.4, -0.5, end) * arm.linear();
+		otherArm.linear() = mirror * arm.linear() * frame.transpose() * mirror * otherFrame;
+		// With the button still down.
+		EXPECT_EVENTUALLY(Sees(m_Eye.Project(arm * elbow), IsMagenta));
+		EXPECT_EVENTUALLY(Sees(m_Eye.Project(otherArm * otherElbow), IsMagenta));
+		rOperator.Release(Qt::LeftButton, end);
+		EXPECT_TRUE(Selected("targetSegments", "upperArmLeft"));
+		drag({Qt::LeftButton}, {90, 140});
+		m_Eye.Orbit({90, 140});
+	}
+
+	rOperator.Click("updateTargets");
+	rOperator.Click("saveAs");
+	rOperator.AnswerDialog(File("posed.qrr"));
+	EXPECT_EVENTUALLY(QFile::exists(File("posed.qrr")));
+	const QByteArray saved = Content("posed.qrr");
+	const Eigen::Vector3d pose = Pose(saved, "upperArmLeft");
+	const Eigen::Vector3d otherPose = Pose(saved, "upperArmRight");
+	EXPECT_LT((pose - Log(frame.transpose() * arm.linear())).norm(), 1e-6) << pose;
+	EXPECT_LT((otherPose - Log(otherFrame.transpose() * otherArm.linear())).norm(), 1e-6) << otherPose;
+	m_Edits +=
+	    {"--pose", "upperArmLeft=" + Text(pose), "--pose", "upperArmRight=" + Text(otherPose), "--update-targets"};
+	EXPECT_TRUE(CommandLine(m_Edits) == saved);
+
+	m_Target = ReadSkeleton(Run({"fk", File("posed.qrr")}));
+	PointAtBone("foreArmRight", "palmRight");
+	PointAtBone("foreArmLeft", "palmLeft");
+}
+
+} // namespace

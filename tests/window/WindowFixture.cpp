@@ -1,0 +1,101 @@
+#include "WindowFixture.h"
+
+#include "studio/DarkStyle.h"
+#include "studio/Preferences.h"
+#include "studio/RetargetPanel.h"
+#include "studio/Services.h"
+
+#include <QAbstractItemModel>
+#include <QApplication>
+#include <QFile>
+#include <QProcess>
+#include <QQuickWidget>
+#include <QTest>
+
+namespace
+{
+
+/// The one application of the process, as the program has it.
+class VApplication : public testing::Environment
+{
+public:
+	void SetUp() override
+	{
+		QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts);
+		m_pApplication = std::make_unique<QApplication>(m_Count, m_pArguments);
+		StudioHost::ApplyDarkStyle(*m_pApplication);
+	}
+	void TearDown() override { m_pApplication.reset(); }
+
+private:
+	int m_Count = 1;
+	char m_Name[5] = "test";
+	char* m_pArguments[2] = {m_Name, nullptr};
+	std::unique_ptr<QApplication> m_pApplication;
+};
+
+[[maybe_unused]] auto* const s_pEnvironment = testing::AddGlobalTestEnvironment(new VApplication);
+
+} // namespace
+
+void Window::SetUp()
+{
+	const std::string folder = m_Folder.path().toStdString();
+	QFile::copy(RETARGET_SOURCE "/demo/performer.qrs", m_Folder.filePath("performer.qrs"));
+	QFile::copy(RETARGET_SOURCE "/demo/character.fbx", m_Folder.filePath("character.fbx"));
+	m_pSettings = std::make_unique<QSettings>(m_Folder.filePath("studio.ini"), QSettings::IniFormat);
+	m_pWindow = std::make_unique<StudioHost::VStudioWindow>(*m_pSettings);
+	for (const char* const pKey : {"FolderSubjects", "FolderSkins", "FolderRetargets"})
+		m_pWindow->Context().Preferences().SetFolder(pKey, folder);
+	ASSERT_TRUE(m_pWindow->LoadModule(RETARGET_MODULE));
+	m_pWindow->resize(1280, 800);
+	m_pWindow->show();
+	m_pWindow->activateWindow();
+	ASSERT_TRUE(QTest::qWaitForWindowActive(m_pWindow.get()));
+	auto* const pPanel = qobject_cast<QQuickWidget*>(m_pWindow->RetargetPanel()->Widget());
+	ASSERT_TRUE(pPanel && pPanel->rootObject());
+	m_pOperator = std::make_unique<VOperator>(*m_pWindow, *pPanel);
+}
+
+QByteArray Window::Content(const char* i_pName) const
+{
+	QFile file(File(i_pName));
+	EXPECT_TRUE(file.open(QIODevice::ReadOnly)) << i_pName;
+	return file.readAll();
+}
+
+QByteArray Window::Run(const QStringList& i_rArguments) const
+{
+	QProcess process;
+	process.start(RETARGET_PROGRAM, QStringList{"-q"} + i_rArguments);
+	EXPECT_TRUE(process.waitForFinished(60000));
+	EXPECT_EQ(process.exitCode(), 0) << process.readAllStandardError().toStdString();
+	return process.readAllStandardOutput();
+}
+
+QByteArray Window::CommandLine(const QStringList& i_rArguments) const
+{
+	Run(i_rArguments + QStringList{"-o", File("expected.qrr")});
+	return Content("expected.qrr");
+}
+
+void Window::CreateTargetSubject()
+{
+	m_pOperator->Choose("SourceSkeleton", "performer");
+	EXPECT_EVENTUALLY(m_pOperator->Property("sourceSegments", "count").toInt() > 20);
+	m_pOperator->Choose("TargetFBX", "character");
+	EXPECT_EVENTUALLY(m_pOperator->Property("TargetRoot", "currentText").toString() == "haunch");
+	m_pOperator->Click("createTargetSubject");
+	EXPECT_EVENTUALLY(m_pOperator->Property("targetSegments", "count").toInt() > 20);
+}
+
+int Window::RowOf(const char* i_pList, const char* i_pName) const
+{
+	QObject* const pModel = m_pOperator->Property(i_pList, "model").value<QObject*>();
+	const auto* const pItems = qobject_cast<QAbstractItemModel*>(pModel);
+	for (int row = 0; pItems && row < pItems->rowCount(); ++row)
+		if (pItems->data(pItems->index(row, 0), Qt::UserRole + 1).toString() == i_pName)
+			return row;
+	ADD_FAILURE() << i_pName;
+	return 0;
+}
