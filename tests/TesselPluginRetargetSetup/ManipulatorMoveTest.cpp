@@ -37,7 +37,10 @@ VSubjectParametrised Subject()
 	for (std::size_t i = 0; i < 3; ++i)
 	{
 		subject.m_Segments[i].m_Name = names[i];
-		subject.m_Segments[i].m_Joint.m_BindPose.assign(i == 0 ? 6 : 3, 0.125);
+		subject.m_Segments[i].m_Joint.m_JointType =
+		    i == 0 ? VSubjectParametrised::VJoint::EFree : VSubjectParametrised::VJoint::EBall;
+		// That of the right arm is missing.
+		subject.m_Segments[i].m_Joint.m_BindPose.assign(i == 0 ? 6 : i == 1 ? 3 : 0, 0.125);
 	}
 	return subject;
 }
@@ -62,13 +65,13 @@ TEST(ManipulatorMove, TheRootMovesAndTurnsAndOthersOnlyTurn)
 {
 	VSubjectParametrised subject = Subject();
 	EXPECT_TRUE(RetargetSetup::MoveSegment(subject, 0, Place(5, 6, 1007, 90), Frame(0), true, Frame));
-	ExpectNear(subject.m_Segments[0].m_Joint.m_BindPose, {0, 0, c_Quarter, 5, 6, 1007});
+	ExpectNear(subject.m_Segments[0].m_Joint.m_BindPose, {0, 0, c_Quarter, 5, 6, 7});
 	EXPECT_EQ(subject.m_Segments[0].m_Joint.m_Mean, subject.m_Segments[0].m_Joint.m_BindPose);
 	ExpectNear(subject.m_Segments[1].m_Joint.m_BindPose, {0.125, 0.125, 0.125});
 
 	EXPECT_TRUE(RetargetSetup::MoveSegment(subject, 1, Place(999, 6, 1007, 90, {1, 0, 0}), Frame(1), false, Frame));
 	ExpectNear(subject.m_Segments[1].m_Joint.m_BindPose, {c_Quarter, 0, 0});
-	ExpectNear(subject.m_Segments[2].m_Joint.m_BindPose, {0.125, 0.125, 0.125});
+	ExpectNear(subject.m_Segments[2].m_Joint.m_BindPose, {});
 
 	EXPECT_FALSE(RetargetSetup::MoveSegment(subject, 3, {}, {}, true, Frame));
 }
@@ -113,7 +116,7 @@ TEST(ManipulatorMove, JointsInOnePlaceTurnTheRotationRound)
 {
 	VSubjectParametrised::VSegment mirror;
 	mirror.m_Joint.m_BindPose = {0.0, 0.0};
-	RetargetSetup::PoseMirrorSegment(mirror, {}, Place(0, 0, 0, 90, {0, 1, 0}), {}, {});
+	RetargetSetup::PoseMirrorSegment(mirror, {}, Place(0, 0, 0, 90, {0, 1, 0}), Place(0, 0.0009f, 0), {});
 	ExpectNear(mirror.m_Joint.m_BindPose, {0, -c_Quarter});
 }
 

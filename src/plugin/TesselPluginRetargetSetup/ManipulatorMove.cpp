@@ -1,5 +1,6 @@
 #include "TesselPluginRetargetSetup/ManipulatorMove.h"
 
+#include "CoreOrlexTypes/JointType.h"
 #include "RetargetSetupDocument/AngleAxis.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
 
@@ -18,10 +19,20 @@ namespace
 
 constexpr std::size_t c_RotationLength = 3;
 constexpr std::size_t c_RootLength = 6;
+/// Joints nearer than this, in mm, coincide.
+constexpr float c_SamePlace = 1e-3f;
 
 QVector3D Origin(const QMatrix4x4& i_rMatrix)
 {
 	return i_rMatrix.column(3).toVector3D();
+}
+
+/// The joint's bind pose, with a value for each of its degrees of freedom.
+std::vector<double>& WholePose(VSubjectParametrised::VJoint& io_rJoint)
+{
+	io_rJoint.m_BindPose.resize(
+	    std::max(io_rJoint.m_BindPose.size(), CoreOrlexTypes::StateSize(io_rJoint.m_JointType)));
+	return io_rJoint.m_BindPose;
 }
 
 void SetRotation(std::vector<double>& io_rPose, const QMatrix4x4& i_rRotation)
@@ -43,11 +54,12 @@ QMatrix4x4 JointFrame(const QMatrix4x4& i_rParentWorld, const VSubject::VSegment
 void PoseSegment(VSubjectParametrised::VSegment& io_rSegment, const QMatrix4x4& i_rJointFrame,
     const QMatrix4x4& i_rWorld, bool i_bRoot)
 {
-	std::vector<double>& rPose = io_rSegment.m_Joint.m_BindPose;
-	SetRotation(rPose, i_rJointFrame.inverted() * i_rWorld);
+	std::vector<double>& rPose = WholePose(io_rSegment.m_Joint);
+	const QMatrix4x4 local = i_rJointFrame.inverted() * i_rWorld;
+	SetRotation(rPose, local);
 	if (i_bRoot)
 		for (std::size_t i = c_RotationLength; i < std::min(c_RootLength, rPose.size()); ++i)
-			rPose[i] = double(i_rWorld(int(i - c_RotationLength), 3));
+			rPose[i] = double(local(int(i - c_RotationLength), 3));
 	io_rSegment.m_Joint.m_Mean = rPose;
 }
 
@@ -56,11 +68,12 @@ void PoseMirrorSegment(VSubjectParametrised::VSegment& io_rMirrorSegment, const 
 {
 	const Rotation::VVector3 turn = MatrixToAngleAxis(i_rWorld * i_rJointFrame.inverted());
 	const QVector3D w{float(turn[0]), float(turn[1]), float(turn[2])};
-	const QVector3D normal = (Origin(i_rOrigin) - Origin(i_rMirrorJointFrame)).normalized();
+	const QVector3D between = Origin(i_rOrigin) - Origin(i_rMirrorJointFrame);
+	const QVector3D normal = between.length() < c_SamePlace ? QVector3D() : between.normalized();
 	// A mirror makes of a rotation about an axis one the other way about the mirrored axis.
 	const QVector3D mirrored = -(w - 2.0f * QVector3D::dotProduct(w, normal) * normal);
 	const QMatrix4x4 rotation = AngleAxisToMatrix({double(mirrored.x()), double(mirrored.y()), double(mirrored.z())});
-	std::vector<double>& rPose = io_rMirrorSegment.m_Joint.m_BindPose;
+	std::vector<double>& rPose = WholePose(io_rMirrorSegment.m_Joint);
 	SetRotation(rPose, i_rMirrorJointFrame.inverted() * rotation * i_rMirrorJointFrame);
 	io_rMirrorSegment.m_Joint.m_Mean = rPose;
 }
