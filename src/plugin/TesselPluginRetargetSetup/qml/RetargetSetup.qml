@@ -252,7 +252,8 @@ Rectangle {
 					emptyText: targetSegments.count === 0
 						? "Choose a source skeleton and a target FBX above, then create the target subject."
 						: sourceSegments.count === 0 ? "Choose a source skeleton above."
-						: "Select one segment in each list on the right, then add a target."
+						: "Select one segment in each list on the right, or in the view, where a click with "
+						+ "Shift or Ctrl adds to what is selected. Then add a target."
 					Layout.fillHeight: true
 					// Room for reasons of refusal beside the parameters.
 					Layout.minimumHeight: 3 * Theme.itemHeight

@@ -8,7 +8,9 @@ ToolTip {
 
 	property var scene: null
 
-	text: scene ? scene.toolTipText : ""
+	objectName: "sceneToolTip"
+	// Names come from files: they stay plain text, and only what parts them becomes a line.
+	text: scene ? scene.toolTipText.replace(/<br>/g, "\n") : ""
 	x: scene ? scene.mousePos.x + 10 : 0
 	y: scene ? scene.mousePos.y + 10 : 0
 	visible: text !== ""
