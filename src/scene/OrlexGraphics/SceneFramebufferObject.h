@@ -138,6 +138,8 @@ private:
 	/// Places the labels of cameras and subjects over the view.
 	void OnFrameChanged();
 	void SetModifiers(Qt::KeyboardModifiers i_Modifiers);
+	/// Nothing is pointed at.
+	void ClearPreview();
 	/// The manipulator that a condition holds for, null if there is none.
 	IManipulator* FindManipulator(bool (IManipulator::*i_pCondition)() const) const;
 	bool IsCameraView() const;
@@ -156,6 +158,8 @@ private:
 	QQmlPropertyMap* const m_pOptionsMap;
 	const std::shared_ptr<CoreGraphics::VCameraController> m_pCamera;
 	QPoint m_MousePos;
+	/// Where the preselection was picked.
+	QPoint m_PreviewPos;
 	EMouseState m_MouseState = EMouseIdle;
 	/// CoreGraphics::EModifierState.
 	std::uint32_t m_ModifierState = 0;

@@ -74,15 +74,20 @@ void VSceneFramebufferObject::PreviewPick(const VPick& i_rPick)
 	    [](const NVX::ISelectionItem& i_rItem) { return i_rItem.m_Kind == ESelectionCamera; });
 	QString toolTip = QString::fromStdString(ToolTip(i_rPick.m_Names));
 	const bool bItems = items != rpManager->PreSelection().Items();
+	const QPoint place = i_rPick.m_Request.m_Mouse;
 	if (!bItems && toolTip == m_ToolTipText && bNumbers == m_bShowCameraNumbers)
+	{
+		m_PreviewPos = place;
 		return;
+	}
 	QMetaObject::invokeMethod(
 	    this,
-	    [this, pManager = rpManager, items = std::move(items), toolTip = std::move(toolTip), bNumbers]
+	    [this, pManager = rpManager, items = std::move(items), toolTip = std::move(toolTip), bNumbers, place]
 	    {
 		    // The mouse may have left since.
 		    if (m_MouseState == EMouseIdle)
 			    return;
+		    m_PreviewPos = place;
 		    pManager->PreSelection().Replace(items);
 		    SetToolTipText(toolTip);
 		    SetShowCameraNumbers(bNumbers);

@@ -20,6 +20,9 @@ namespace OrlexGraphics
 namespace
 {
 
+/// How far from where a handle was seen under the mouse a press still takes it, in pixels.
+constexpr int c_HandleReach = 10;
+
 std::uint32_t ModifierState(Qt::KeyboardModifiers i_Modifiers)
 {
 	const bool bShift = i_Modifiers.testFlag(Qt::ShiftModifier);
@@ -58,8 +61,10 @@ void VSceneFramebufferObject::mousePressEvent(QMouseEvent* io_pEvent)
 	SetModifiers(io_pEvent->modifiers());
 	SetMousePos(io_pEvent->pos());
 	forceActiveFocus();
+	// What was picked some frames ago may be far from the mouse by now.
+	const bool bAtPick = (io_pEvent->pos() - m_PreviewPos).manhattanLength() <= c_HandleReach;
 	if (IManipulator* const pManipulator = FindManipulator(&IManipulator::IsHovered);
-	    pManipulator && io_pEvent->button() == Qt::LeftButton)
+	    pManipulator && bAtPick && io_pEvent->button() == Qt::LeftButton)
 	{
 		pManipulator->Press(*m_pCamera, io_pEvent->pos());
 		m_MouseState = EMouseIdle;
@@ -91,6 +96,7 @@ void VSceneFramebufferObject::mouseMoveEvent(QMouseEvent* io_pEvent)
 	{
 		m_MouseState = EMouseIdle;
 		m_bPressPending = false;
+		ClearPreview();
 		m_pCamera->Move(io_pEvent->pos());
 		OnFrameChanged();
 	}
@@ -183,10 +189,15 @@ void VSceneFramebufferObject::hoverLeaveEvent(QHoverEvent* /*io_pEvent*/)
 {
 	if (m_MouseState != EMouseDragged)
 		m_MouseState = EMouseIdle;
+	ClearPreview();
+	update();
+}
+
+void VSceneFramebufferObject::ClearPreview()
+{
 	if (m_pScene && m_pScene->SelectionManager())
 		m_pScene->SelectionManager()->PreSelection().Replace({});
 	SetToolTipText(QString());
-	update();
 }
 
 VPickRequest VSceneFramebufferObject::MakePickRequest(std::uint64_t i_Frame) const
