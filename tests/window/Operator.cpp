@@ -7,6 +7,7 @@
 #include <QLineEdit>
 #include <QQuickItem>
 #include <QQuickWidget>
+#include <QQuickWindow>
 #include <QScreen>
 #include <QTest>
 #include <QWheelEvent>
@@ -37,8 +38,7 @@ QQuickItem* Top(QQuickItem* i_pItem)
 
 bool Eventually(const std::function<bool()>& i_rCondition)
 {
-	return QTest::qWaitFor(
-	    i_rCondition, qEnvironmentVariableIsSet("WAIT") ? qEnvironmentVariableIntValue("WAIT") : 60000);
+	return QTest::qWaitFor(i_rCondition, 60000);
 }
 
 VOperator::VOperator(QWidget& i_rWindow, QQuickWidget& i_rPanel) : m_rWindow(i_rWindow), m_rPanel(i_rPanel) {}
@@ -59,6 +59,16 @@ QVariant VOperator::Property(const QString& i_rName, const char* i_pProperty) co
 	return pItem ? pItem->property(i_pProperty) : QVariant();
 }
 
+void VOperator::WaitForDrawing() const
+{
+	bool bDrawn = false;
+	const auto connection =
+	    QObject::connect(m_rPanel.quickWindow(), &QQuickWindow::afterRendering, [&bDrawn] { bDrawn = true; });
+	m_rPanel.quickWindow()->update();
+	EXPECT_EVENTUALLY(bDrawn);
+	QObject::disconnect(connection);
+}
+
 void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers)
 {
 	const QQuickItem* const pItem = Item(i_rName);
@@ -69,7 +79,7 @@ void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers)
 	    [&]
 	    {
 		    const QPoint now = pItem->mapToScene({pItem->width() / 2, pItem->height() / 2}).toPoint();
-		    QTest::qWait(0);
+		    WaitForDrawing();
 		    return std::exchange(place, now) == now;
 	    }));
 	ASSERT_TRUE(m_rPanel.rect().contains(place)) << i_rName.toStdString();
@@ -125,6 +135,7 @@ void VOperator::Drag(const QVector<Qt::MouseButton>& i_rButtons, const QPoint& i
     Qt::KeyboardModifiers i_Modifiers)
 {
 	constexpr int c_Steps = 5;
+	Point(i_rFrom, i_Modifiers);
 	for (const Qt::MouseButton button : i_rButtons)
 		Press(button, i_rFrom, i_Modifiers);
 	for (int i = 1; i <= c_Steps; ++i)

@@ -64,6 +64,8 @@ public:
 
 private:
 	QWidget* Dialog() const;
+	/// Until the panel has been laid out and drawn once more.
+	void WaitForDrawing() const;
 	QPoint InWindow(const QPointF& i_rPlace) const;
 	/// The dialog has closed, and the keyboard is the window's again.
 	bool ComeBack();
