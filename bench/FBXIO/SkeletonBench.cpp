@@ -2,6 +2,7 @@
 // assimp without any post-processing.
 #include "../Ratios.h"
 #include "Character.h"
+#include "PeakMemory.h"
 
 #include "../../tests/fbxsdk/FbxFileBuilder.h"
 #include "../../tests/fbxsdk/TestFile.h"
@@ -30,6 +31,32 @@ void CountPerBone(benchmark::State& io_rState, std::size_t i_Bones)
 	    double(i_Bones), benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
 }
 
+/// Without any post-processing, pivots not split.
+bool ReadWithAssimp(Assimp::Importer& io_rImporter, const std::string& i_rPath)
+{
+	io_rImporter.SetPropertyBool(AI_CONFIG_IMPORT_FBX_PRESERVE_PIVOTS, false);
+	return io_rImporter.ReadFile(i_rPath, 0) != nullptr;
+}
+
+bool ReadPlacedMeshes(const std::string& i_rPath)
+{
+	FBXIO::FBXReader reader;
+	std::vector<FBXIO::VPlacedMesh> meshes;
+	if (reader.LoadFile(i_rPath))
+		reader.ReadPlacedMeshes(meshes);
+	return !meshes.empty();
+}
+
+/// The skeleton, the meshes that are bound to it, and their weights.
+bool ReadSkin(const std::string& i_rPath)
+{
+	FBXIO::FBXReader reader;
+	FBXIO::VSkin skin;
+	if (reader.LoadFile(i_rPath))
+		reader.ReadSkin(skin);
+	return !skin.m_Meshes.empty();
+}
+
 void Skeleton(benchmark::State& io_rState, const std::string& i_rPath)
 {
 	const std::size_t bones = Bones(i_rPath);
@@ -43,10 +70,9 @@ void AssimpImport(benchmark::State& io_rState, const std::string& i_rPath)
 {
 	// Made once: what an importer costs without a file is not counted.
 	Assimp::Importer importer;
-	importer.SetPropertyBool(AI_CONFIG_IMPORT_FBX_PRESERVE_PIVOTS, false);
 	for (auto _ : io_rState)
 	{
-		if (!importer.ReadFile(i_rPath, 0))
+		if (!ReadWithAssimp(importer, i_rPath))
 			io_rState.SkipWithError(importer.GetErrorString());
 		importer.FreeScene();
 	}
@@ -56,27 +82,39 @@ void AssimpImport(benchmark::State& io_rState, const std::string& i_rPath)
 void PlacedMeshes(benchmark::State& io_rState, const std::string& i_rPath)
 {
 	for (auto _ : io_rState)
-	{
-		FBXIO::FBXReader reader;
-		std::vector<FBXIO::VPlacedMesh> meshes;
-		if (reader.LoadFile(i_rPath))
-			reader.ReadPlacedMeshes(meshes);
-		if (meshes.empty())
+		if (!ReadPlacedMeshes(i_rPath))
 			io_rState.SkipWithError("without mesh");
-	}
 }
 
-/// The skeleton, the meshes that are bound to it, and their weights.
 void Skin(benchmark::State& io_rState, const std::string& i_rPath)
 {
 	for (auto _ : io_rState)
-	{
-		FBXIO::FBXReader reader;
-		FBXIO::VSkin skin;
-		if (reader.LoadFile(i_rPath))
-			reader.ReadSkin(skin);
-		if (skin.m_Meshes.empty())
+		if (!ReadSkin(i_rPath))
 			io_rState.SkipWithError("without skin");
+}
+
+void Work(const std::string& i_rWork, const std::string& i_rPath)
+{
+	if (i_rWork == "skeleton")
+		Bones(i_rPath);
+	else if (i_rWork == "skin")
+		ReadSkin(i_rPath);
+	else
+	{
+		Assimp::Importer importer;
+		ReadWithAssimp(importer, i_rPath);
+	}
+}
+
+/// Most memory beside assimp's.
+void PrintPeaks(const std::string& i_rName, const std::string& i_rPath)
+{
+	const double peer = PeakMemory::Of("assimp", i_rPath);
+	for (const char* pWork : {"skeleton", "skin"})
+	{
+		const double ours = PeakMemory::Of(pWork, i_rPath);
+		std::printf("peak memory, %s of %s: %.1f MiB, assimp %.1f MiB%s\n", pWork, i_rName.c_str(), ours, peer,
+		    ours < 0 || ours >= peer ? " EXCEEDED" : "");
 	}
 }
 
@@ -96,10 +134,14 @@ void Chain(benchmark::State& io_rState, const FbxTest::VTestForm& i_rForm)
 
 int main(int i_Count, char** i_ppArguments)
 {
+	if (PeakMemory::WasAskedFor(i_Count, i_ppArguments, Work))
+		return 0;
 	static std::list<std::string> s_Names;
 	std::vector<Ratios::VRatio> ratios;
+	std::vector<std::pair<std::string, std::string>> files;
 	const auto compare = [&](const std::string& i_rName, const std::string& i_rPath, bool i_bSkin)
 	{
+		files.emplace_back(i_rName, i_rPath);
 		const std::string& rPeer = s_Names.emplace_back("Assimp:" + i_rName);
 		benchmark::RegisterBenchmark(rPeer.c_str(), AssimpImport, i_rPath)->MeasureProcessCPUTime()->UseRealTime();
 		const auto beside = [&](const char* i_pRow, auto i_Run, double i_Limit)
@@ -128,5 +170,8 @@ int main(int i_Count, char** i_ppArguments)
 		for (const int bones : {30, 100, 300, 1000, 3000})
 			pChain->Arg(bones);
 	}
-	return Ratios::Main(i_Count, i_ppArguments, ratios);
+	const int status = Ratios::Main(i_Count, i_ppArguments, ratios);
+	for (const auto& [name, path] : files)
+		PrintPeaks(name, path);
+	return status;
 }

@@ -3,13 +3,14 @@
 #include "DebugServices/GlobalLog.h"
 #include "FBXIO/Matrices.h"
 #include "FBXIO/Polygons.h"
+#include "FBXIO/SkinWeights.h"
 #include "UtilsFileSystem/Paths.h"
 
 #include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
-#include <array>
 #include <cmath>
+#include <future>
 #include <map>
 
 namespace
@@ -19,46 +20,6 @@ using namespace FBXIO;
 
 /// The number of polygon vertices from which indices need four bytes.
 constexpr std::size_t c_FirstLargeCount = 0x10000;
-
-struct VInfluence
-{
-	std::int32_t m_Bone = 0;
-	float m_Weight = 0.0f;
-
-	bool IsBefore(const VInfluence& i_rOther) const
-	{
-		return m_Weight != i_rOther.m_Weight ? m_Weight > i_rOther.m_Weight : m_Bone < i_rOther.m_Bone;
-	}
-};
-
-constexpr std::size_t c_MostInfluences = 4;
-
-/// The largest influences on a point, in order.
-struct VInfluences
-{
-	std::array<VInfluence, c_MostInfluences> m_Largest;
-	/// One more than there can be if any was dropped.
-	std::size_t m_Count = 0;
-
-	/// @return the weight that is dropped for it; 0 if none is.
-	float Add(const VInfluence& i_rInfluence)
-	{
-		float dropped = 0.0f;
-		std::size_t at = m_Count++;
-		if (at >= c_MostInfluences)
-		{
-			m_Count = c_MostInfluences + 1;
-			at = c_MostInfluences - 1;
-			dropped = std::min(m_Largest[at].m_Weight, i_rInfluence.m_Weight);
-			if (!i_rInfluence.IsBefore(m_Largest[at]))
-				return dropped;
-		}
-		for (; at > 0 && i_rInfluence.IsBefore(m_Largest[at - 1]); --at)
-			m_Largest[at] = m_Largest[at - 1];
-		m_Largest[at] = i_rInfluence;
-		return dropped;
-	}
-};
 
 QVector4D ColourAndFactor(const FbxPropertyT<FbxDouble3>& i_rColour, const FbxPropertyT<FbxDouble>& i_rFactor)
 {
@@ -82,27 +43,8 @@ void ForEachCluster(FbxSkin& i_rSkin, TVisit&& i_Visit)
 			i_Visit(*pCluster);
 }
 
-/// Fractions are cut off: what is missing to 255 is lost.
-/// @return false if the weights give nothing.
-bool Quantise(const VInfluences& i_rInfluences, VSkinVertex& o_rVertex)
-{
-	const std::size_t count = std::min(i_rInfluences.m_Count, c_MostInfluences);
-	double sum = 0.0;
-	for (std::size_t i = 0; i < count; ++i)
-		sum += i_rInfluences.m_Largest[i].m_Weight;
-	int remaining = 255;
-	for (std::size_t i = 0; i < count; ++i)
-	{
-		o_rVertex.m_BoneIndices[i] = std::uint8_t(i_rInfluences.m_Largest[i].m_Bone);
-		if (!(sum > 0.0))
-			continue;
-		const double part = i_rInfluences.m_Largest[i].m_Weight * 255.0 / sum;
-		const int weight = int(std::clamp(part, 0.0, double(remaining)));
-		o_rVertex.m_BoneWeights[i] = std::uint8_t(weight);
-		remaining -= weight;
-	}
-	return sum > 0.0;
-}
+/// The number of control points from which a second thread is worth its start.
+constexpr std::size_t c_PointsForTwo = 4000;
 
 bool Exists(const boost::filesystem::path& i_rPath)
 {
@@ -300,56 +242,29 @@ std::int64_t FBXIO::FBXMeshReader::BindBone(FbxCluster& i_rCluster)
 	return bone;
 }
 
-void FBXIO::FBXMeshReader::ReadWeights(FbxNode& i_rNode, FbxSkin& i_rSkin, std::vector<VSkinVertex>& io_rVertices)
-{
-	std::vector<VInfluences> influences(io_rVertices.size());
-	std::size_t broken = 0;
-	float largestDropped = 0.0f;
-	ForEachCluster(i_rSkin,
-	    [&](FbxCluster& i_rCluster)
-	    {
-		    const auto bone = std::int32_t(BindBone(i_rCluster));
-		    const int* const pPoints = i_rCluster.GetControlPointIndices();
-		    const double* const pWeights = i_rCluster.GetControlPointWeights();
-		    for (int i = 0, count = i_rCluster.GetControlPointIndicesCount(); i < count; ++i)
-		    {
-			    const float weight = float(pWeights[i]);
-			    if (pPoints[i] >= 0 && std::size_t(pPoints[i]) < influences.size() && std::isfinite(weight))
-			    {
-				    const float dropped = influences[pPoints[i]].Add({bone, weight});
-				    largestDropped = dropped > largestDropped ? dropped : largestDropped;
-			    }
-			    else
-				    ++broken;
-		    }
-	    });
-
-	std::size_t overFull = 0;
-	std::size_t unweighted = 0;
-	for (std::size_t point = 0; point < io_rVertices.size(); ++point)
-	{
-		overFull += influences[point].m_Count > c_MostInfluences ? 1 : 0;
-		unweighted += Quantise(influences[point], io_rVertices[point]) ? 0 : 1;
-	}
-	if (broken > 0)
-		NVX_LOG("FBXIO", NVX::ELogWarning,
-		    "%1% weights of mesh %2% left out because they are no numbers or name control points that do not exist",
-		    broken, i_rNode.GetName());
-	if (overFull > 0)
-		NVX_LOG("FBXIO", NVX::ELogDetail, "Too many bones on %1% vertices, with maximum contribution of %2%%%",
-		    overFull, largestDropped * 100.0f);
-	if (unweighted > 0)
-		NVX_LOG("FBXIO", NVX::ELogWarning, "%1% unweighted vertices in mesh %2%", unweighted, i_rNode.GetName());
-}
-
 void FBXIO::FBXMeshReader::ReadSkinMesh(FbxNode& i_rNode, std::vector<VSkinMesh>& io_rMeshes)
 {
 	FbxSkin* const pSkin = FindSkin(i_rNode);
 	FbxMesh* const pMesh = pSkin && m_pSkeleton ? i_rNode.GetMesh() : nullptr;
 	if (!pMesh)
 		return;
+	VBoundClusters clusters;
+	ForEachCluster(*pSkin,
+	    [&](FbxCluster& i_rCluster) { clusters.emplace_back(&i_rCluster, std::int32_t(BindBone(i_rCluster))); });
+	const std::size_t points = pMesh->GetControlPointsCount();
+	// Beside the vertices, which have nothing to do with weights; small meshes are not worth a thread. With both
+	// policies it is one as long as the system has one to give.
+	std::future<VSkinWeights> weights =
+	    std::async(points < c_PointsForTwo ? std::launch::deferred : std::launch::async | std::launch::deferred,
+	        [&] { return ReadSkinWeights(clusters, points); });
 	VSkinMesh& rMesh = io_rMeshes.emplace_back();
 	Prepare(i_rNode, *pMesh, rMesh);
-	ReadWeights(i_rNode, *pSkin, rMesh.m_Vertices);
+	const VSkinWeights read = weights.get();
+	for (std::size_t point = 0; point < points; ++point)
+	{
+		rMesh.m_Vertices[point].m_BoneIndices = read.m_Points[point].m_Bones;
+		rMesh.m_Vertices[point].m_BoneWeights = read.m_Points[point].m_Weights;
+	}
+	TellSkinWeights(read, i_rNode.GetName());
 	Finish(i_rNode, *pMesh, rMesh);
 }

@@ -48,7 +48,6 @@ private:
 	void Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const;
 	void ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPart& io_rPart);
 	std::string FindTexture(const FbxFileTexture& i_rTexture) const;
-	void ReadWeights(FbxNode& i_rNode, FbxSkin& i_rSkin, std::vector<VSkinVertex>& io_rVertices);
 	/// 0, and told, if the skeleton has no bone of the link's name.
 	std::int64_t BindBone(FbxCluster& i_rCluster);
 	/// -1, and told, if the skeleton has none.

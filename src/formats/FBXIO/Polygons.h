@@ -26,6 +26,15 @@ inline float Finite(double i_Number)
 	return Finite(i_Number, bSound);
 }
 
+/// What was made of an entry of the texture coordinates.
+struct VEntryVertex
+{
+	static constexpr std::uint32_t c_None = 0xFFFFFFFFu;
+	std::uint32_t m_Vertex = c_None;
+	/// The control point that it was made of.
+	std::uint32_t m_Point = c_None;
+};
+
 /// Gives vertices their texture coordinates. Where these are given by polygon vertex the vertices become one for each
 /// coordinate; io_rIndices, the vertices of all polygons, follow.
 /// @param i_pName the node's, for messages: meshes of some exporters have none.
@@ -62,8 +71,7 @@ void ApplyTexCoords(
 		return;
 	}
 	const auto* const pIndex = pUV->GetReferenceMode() != FbxLayerElement::eDirect ? &pUV->GetIndexArray() : nullptr;
-	constexpr std::uint32_t c_None = 0xFFFFFFFFu;
-	std::vector<std::uint32_t> vertexOfEntry(entries, c_None);
+	std::vector<VEntryVertex> entryVertices(entries);
 	std::vector<TVertex> vertices;
 	vertices.reserve(entries);
 	std::size_t moved = 0;
@@ -74,24 +82,25 @@ void ApplyTexCoords(
 		for (int i = start; i < end; ++i)
 		{
 			const int entry = !pIndex ? i : i < pIndex->GetCount() ? pIndex->GetAt(i) : -1;
-			const TVertex& rPoint = io_rVertices[io_rIndices[i]];
+			const std::uint32_t point = io_rIndices[i];
 			if (entry < 0 || entry >= entries)
 			{
 				++missing;
 				io_rIndices[i] = std::uint32_t(vertices.size());
-				vertices.push_back(rPoint);
+				vertices.push_back(io_rVertices[point]);
 				continue;
 			}
-			std::uint32_t& rVertex = vertexOfEntry[entry];
-			if (rVertex == c_None)
+			VEntryVertex& rEntry = entryVertices[entry];
+			if (rEntry.m_Vertex == VEntryVertex::c_None)
 			{
-				rVertex = std::uint32_t(vertices.size());
-				vertices.push_back(rPoint);
+				rEntry = {std::uint32_t(vertices.size()), point};
+				vertices.push_back(io_rVertices[point]);
 				setCoordinate(vertices.back(), entry);
 			}
-			else if (vertices[rVertex].m_Position != rPoint.m_Position)
+			else if (rEntry.m_Point != point
+			    && io_rVertices[rEntry.m_Point].m_Position != io_rVertices[point].m_Position)
 				++moved;
-			io_rIndices[i] = rVertex;
+			io_rIndices[i] = rEntry.m_Vertex;
 		}
 	}
 	io_rVertices = std::move(vertices);

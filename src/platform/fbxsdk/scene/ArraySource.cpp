@@ -3,8 +3,7 @@
 #include "DebugServices/GlobalLog.h"
 
 #include <atomic>
-#include <system_error>
-#include <thread>
+#include <future>
 
 namespace
 {
@@ -53,19 +52,13 @@ void FbxFormat::Decode(std::span<VDecodeJob> io_Jobs)
 		for (std::size_t i = next++; i < jobs.size(); i = next++)
 			Run(*jobs[i]);
 	};
-	std::thread second;
+	std::future<void> second;
+	// With both policies this is a thread as long as the system has one to give.
 	if (jobs.size() > 1 && bytes >= c_BytesForTwo)
-		try
-		{
-			second = std::thread(run);
-		}
-		catch (const std::system_error&)
-		{
-			// The system has no thread to give: one does it all.
-		}
+		second = std::async(std::launch::async | std::launch::deferred, run);
 	run();
-	if (second.joinable())
-		second.join();
+	if (second.valid())
+		second.wait();
 
 	for (const VDecodeJob& rJob : io_Jobs)
 		if (!rJob.m_bSound)
