@@ -222,6 +222,15 @@ TEST_P(RenderManipulator, APressDragsTheHandleThatIsPointedAt)
 	EXPECT_FALSE(m_pManipulator->IsDragging());
 	EXPECT_EQ(begun, 1);
 
+	// Neither does one that the mode has taken away since, nor one that never was.
+	m_pManipulator->SetModeMask(4);
+	for (const VManipulatorHandle& rHandle :
+	    {VManipulatorHandle{EManipulatorArrow, 1}, {EManipulatorMarker, 1}, {40, 0}})
+	{
+		PointAt(rHandle);
+		EXPECT_FALSE(m_pManipulator->IsHovered()) << rHandle.m_Group;
+	}
+
 	// Hidden it takes no press, and hiding it ends a drag.
 	PointAt({EManipulatorRing, 0});
 	m_pManipulator->Press(m_Camera, {250, 150});

@@ -110,13 +110,18 @@ void VRenderManipulator::SetTransform(const QMatrix4x4& i_rTransform)
 	m_State.m_Transform = i_rTransform;
 }
 
+bool VRenderManipulator::HasGroup(const VState& i_rState, std::uint32_t i_Group)
+{
+	return i_Group < EManipulatorMarker && (i_rState.m_ModeMask >> i_Group & 1) != 0;
+}
+
 std::optional<VManipulatorHandle> VRenderManipulator::HoveredHandle() const
 {
 	// A view can point at a handle that has gone since its last frame.
 	if (!m_State.m_bVisible || !m_pSelectionManager)
 		return {};
 	const auto items = m_pSelectionManager->PreSelection().ItemsOfKind(ESelectionManipulatorHandle);
-	if (items.empty())
+	if (items.empty() || !HasGroup(m_State, items.front().m_SubjectId))
 		return {};
 	return VManipulatorHandle{items.front().m_SubjectId, items.front().m_ElementIndex};
 }
@@ -207,7 +212,7 @@ void VRenderManipulator::RenderAxis(VRenderContext& io_rContext, std::uint32_t i
 	/// The group's id or colour; false for a group that is not drawn.
 	const auto begin = [&](std::uint32_t i_Group)
 	{
-		if ((m_Drawn.m_ModeMask >> i_Group & 1) == 0)
+		if (!HasGroup(m_Drawn, i_Group))
 			return false;
 		const CoreGraphics::VSelectionId& rId = IdOf(i_Group, i_Axis);
 		if (bPick && m_pRegistry->IsHidden(rId, io_rContext.m_Mode))

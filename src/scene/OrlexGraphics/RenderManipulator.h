@@ -90,6 +90,7 @@ private:
 		std::optional<VManipulatorHandle> m_Dragged;
 	};
 
+	static bool HasGroup(const VState& i_rState, std::uint32_t i_Group);
 	std::optional<VManipulatorHandle> HoveredHandle() const;
 	const CoreGraphics::VSelectionId& IdOf(std::uint32_t i_Group, std::uint32_t i_Axis) const;
 	void RenderAxis(CoreGraphics::VRenderContext& io_rContext, std::uint32_t i_Axis, float i_Size);
