@@ -1,51 +1,9 @@
+#include "../Allocations.h"
 #include "ReferenceFK.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 
 #include <gtest/gtest.h>
-
-#include <cstdlib>
-#include <new>
-
-namespace
-{
-
-thread_local std::size_t g_Allocations = 0;
-
-void* Allocate(std::size_t i_Size)
-{
-	++g_Allocations;
-	if (void* pMemory = std::malloc(i_Size ? i_Size : 1))
-		return pMemory;
-	throw std::bad_alloc();
-}
-
-} // namespace
-
-void* operator new(std::size_t i_Size)
-{
-	return Allocate(i_Size);
-}
-void* operator new[](std::size_t i_Size)
-{
-	return Allocate(i_Size);
-}
-void operator delete(void* i_pMemory) noexcept
-{
-	std::free(i_pMemory);
-}
-void operator delete[](void* i_pMemory) noexcept
-{
-	std::free(i_pMemory);
-}
-void operator delete(void* i_pMemory, std::size_t) noexcept
-{
-	std::free(i_pMemory);
-}
-void operator delete[](void* i_pMemory, std::size_t) noexcept
-{
-	std::free(i_pMemory);
-}
 
 TEST(Update, AllocatesNothing)
 {
@@ -62,11 +20,11 @@ TEST(Update, AllocatesNothing)
 	const std::vector<double> state = Reference::RandomState(random, subject, 1.0);
 	ComputeSubject::VComputeSubjectFK fk(subject);
 
-	const std::size_t before = g_Allocations;
+	const std::size_t before = AllocationCount();
 	for (int i = 0; i < 10; ++i)
 		fk.Update(state.data());
-	EXPECT_EQ(g_Allocations, before);
+	EXPECT_EQ(AllocationCount(), before);
 	// The counter itself works.
 	ComputeSubject::VComputeSubjectFK copy(fk);
-	EXPECT_GT(g_Allocations, before);
+	EXPECT_GT(AllocationCount(), before);
 }

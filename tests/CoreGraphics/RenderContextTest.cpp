@@ -1,4 +1,4 @@
-#include "OffscreenContext.h"
+#include "DrawingFixture.h"
 
 #include "CoreGraphics/Buffers.h"
 #include "CoreGraphics/RenderContext.h"
@@ -27,19 +27,10 @@ namespace
 
 constexpr int c_Side = 16;
 
-class RenderContext : public GraphicsTest::InBothDialects
+class RenderContext : public GraphicsTest::VDrawingTest
 {
 protected:
-	void SetUp() override
-	{
-		InBothDialects::SetUp();
-		m_Library.InitialiseGL();
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Side, c_Side, QOpenGLFramebufferObject::Depth);
-		m_Render.Initialise();
-		m_Render.ResetState();
-		m_Render.BindFramebuffer(m_pTarget.get());
-		m_Render.SetViewport(QRect(0, 0, c_Side, c_Side));
-	}
+	RenderContext() : VDrawingTest(QSize(c_Side, c_Side)) {}
 
 	QOpenGLFunctions& GL() { return m_Context.GL(); }
 
@@ -56,10 +47,6 @@ protected:
 		m_Render.ReadPixels(QRect(i_X, i_Y, 1, 1), bytes);
 		return {bytes.begin(), bytes.end()};
 	}
-
-	VShaderLibrary m_Library;
-	VRenderContext m_Render;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 };
 INSTANTIATE_IN_BOTH_DIALECTS(RenderContext);
 

@@ -1,4 +1,4 @@
-#include "OffscreenContext.h"
+#include "DrawingFixture.h"
 
 #include "CoreGraphics/Buffers.h"
 #include "CoreGraphics/RenderContext.h"
@@ -18,19 +18,14 @@ namespace
 {
 
 /// One pixel of a square before an eye that looks along -Z from the origin.
-class Shading : public GraphicsTest::InBothDialects
+class Shading : public GraphicsTest::VDrawingTest
 {
 protected:
+	Shading() : VDrawingTest(QSize(1, 1)) {}
+
 	void SetUp() override
 	{
-		InBothDialects::SetUp();
-		m_Library.InitialiseGL();
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(1, 1);
-		m_Render.Initialise();
-		m_Render.ResetState();
-		m_Render.BindFramebuffer(m_pTarget.get());
-		m_Render.SetViewport(QRect(0, 0, 1, 1));
-		m_Render.m_FrameSize = QSize(1, 1);
+		ASSERT_NO_FATAL_FAILURE(VDrawingTest::SetUp());
 		m_Render.m_Projection.ortho(-1, 1, -1, 1, 1, 10);
 		m_Render.SetYUp(true);
 	}
@@ -69,10 +64,6 @@ protected:
 			EXPECT_NEAR(colour[static_cast<std::size_t>(channel)], i_rExpected[channel], 0.008f)
 			    << "channel " << channel;
 	}
-
-	VShaderLibrary m_Library;
-	VRenderContext m_Render;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 };
 INSTANTIATE_IN_BOTH_DIALECTS(Shading);
 

@@ -1,4 +1,4 @@
-#include "OffscreenContext.h"
+#include "DrawingFixture.h"
 
 #include "CoreGraphics/Buffers.h"
 #include "CoreGraphics/RenderContext.h"
@@ -26,18 +26,14 @@ struct VDrawn
 	std::vector<int> m_Colour;
 };
 
-class SkinShader : public GraphicsTest::InBothDialects
+class SkinShader : public GraphicsTest::VDrawingTest
 {
 protected:
+	SkinShader() : VDrawingTest(QSize(c_Width, 2)) {}
+
 	void SetUp() override
 	{
-		InBothDialects::SetUp();
-		m_Library.InitialiseGL();
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Width, 2);
-		m_Render.Initialise();
-		m_Render.ResetState();
-		m_Render.BindFramebuffer(m_pTarget.get());
-		m_Render.SetViewport(QRect(0, 0, c_Width, 2));
+		ASSERT_NO_FATAL_FAILURE(VDrawingTest::SetUp());
 		m_Render.SetClearColour(Qt::black);
 		// One unit is a pixel, and the origin lies at the left edge.
 		m_Render.m_Projection.ortho(0, c_Width, -1, 1, -10, 10);
@@ -77,9 +73,6 @@ protected:
 		return drawn;
 	}
 
-	VShaderLibrary m_Library;
-	VRenderContext m_Render;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 	std::vector<QMatrix4x4> m_Bones = std::vector<QMatrix4x4>(c_Bones);
 };
 INSTANTIATE_IN_BOTH_DIALECTS(SkinShader);

@@ -1,16 +1,11 @@
 #pragma once
 
-#include "../CoreGraphics/OffscreenContext.h"
+#include "../OrlexGraphics/SceneFixture.h"
 #include "../PictureTest.h"
 
-#include "CoreGraphics/ShaderLibrary.h"
 #include "Flow2Graphics/FlowScene.h"
-#include "InMemoryHost/Dispatcher.h"
-#include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/FrameRenderer.h"
 
 #include <QImage>
-#include <QOpenGLFramebufferObject>
 
 struct VView
 {
@@ -24,24 +19,20 @@ struct VView
 };
 
 /// Frames of the flow scene, without floor and axes unless a test wants them.
-class VPicturesTest : public GraphicsTest::InBothDialects
+class VPicturesTest : public VSceneTest
 {
 protected:
+	VPicturesTest() : VSceneTest(QSize(320, 240)) {}
+
 	void SetUp() override
 	{
-		ASSERT_NO_FATAL_FAILURE(InBothDialects::SetUp());
-		m_pScene = std::make_shared<Flow2Graphics::VFlowScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false);
-		m_Renderer.Initialise();
-		m_Renderer.SetScene(m_pScene);
-		m_Renderer.SetSize(m_Size);
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(m_Size, m_Renderer.TargetFormat());
+		ASSERT_NO_FATAL_FAILURE(VSceneTest::SetUp());
+		m_pScene = Show<Flow2Graphics::VFlowScene>();
 		Options().m_bFloorGrid = Options().m_bGlobalAxis = false;
 	}
-	OrlexGraphics::VSceneOptions& Options() { return m_Renderer.m_Input.m_Options; }
-
 	CoreGraphics::VCameraController& SetView(const VView& i_rView)
 	{
-		CoreGraphics::VCameraController& rCamera = m_Renderer.m_Input.m_Camera;
+		CoreGraphics::VCameraController& rCamera = Camera();
 		rCamera.m_Centre = i_rView.m_Centre;
 		rCamera.m_Distance = i_rView.m_Distance;
 		rCamera.m_Pitch = i_rView.m_Pitch;
@@ -57,10 +48,7 @@ protected:
 	QImage Draw(const VView& i_rView)
 	{
 		SetView(i_rView);
-		m_pScene->SetNeedsRefresh();
-		m_pScene->Synchronise();
-		m_Renderer.Update();
-		m_Renderer.Render(*m_pTarget);
+		Frame();
 		return m_pTarget->toImage().convertToFormat(QImage::Format_RGB32);
 	}
 
@@ -71,12 +59,5 @@ protected:
 		    PictureTest::Matches(i_rImage, (GetParam() == GraphicsTest::EDialect::ES2 ? "es2-" : "") + i_rName));
 	}
 
-	const QSize m_Size{320, 240};
-	const std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
-	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
-	    std::make_shared<InMemoryHost::VSelectionManager>();
-	const std::shared_ptr<CoreGraphics::VShaderLibrary> m_pShaders = std::make_shared<CoreGraphics::VShaderLibrary>();
 	std::shared_ptr<Flow2Graphics::VFlowScene> m_pScene;
-	OrlexGraphics::VFrameRenderer m_Renderer;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 };

@@ -1,6 +1,6 @@
 #include "PicturesFixture.h"
 
-#include "../OrlexGraphics/Allocations.h"
+#include "../Allocations.h"
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexTypesUtils/PoseVector.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
@@ -32,7 +32,7 @@ protected:
 		    Item("FlowSubjectDynamicParametersForSolving", TestSubject::MakePose())};
 		if (i_pLabels)
 			items.push_back(Item("FlowReconstructionLabelSetForSolving", *i_pLabels));
-		m_pScene->SetFrame(TestSubject::Frame(items));
+		m_pScene->SetFrame(TestSubject::MakeFrame(items));
 	}
 
 	/// Performer and character of the demo, in the poses that their files hold. The files have Z up.
@@ -66,7 +66,7 @@ protected:
 		using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
 		add(RETARGET_SOURCE "/demo/performer.qrs", VFlowSubjectTypes::c_Types, &VJoint::m_BindPose);
 		add(RETARGET_TEST_DATA "/pictures/kestrel.qrr", VFlowSubjectForSolvingTypes::c_Types, &VJoint::m_BindPose);
-		m_pScene->SetFrame(TestSubject::Frame(items));
+		m_pScene->SetFrame(TestSubject::MakeFrame(items));
 	}
 
 private:

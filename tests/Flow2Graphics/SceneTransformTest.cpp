@@ -18,8 +18,8 @@ using CoreOrlexTypes::VSubjectSettings;
 using Flow2TypesUtils::FlowSubjectSceneTransformItem;
 using Flow2TypesUtils::FlowUpAxisItem;
 using TesselPluginInterface::ItemValue;
-using TestSubject::Frame;
 using TestSubject::Item;
+using TestSubject::MakeFrame;
 using VPlaced = VFlowSubjectSceneArrangement::VPlaced;
 
 TEST(Arrangement, RowsOfTheClassesSortedByName)
@@ -88,7 +88,7 @@ protected:
 	VFlowSubjectSceneTransform m_Transform{
 	    NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)};
 	const NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame =
-	    Frame({Item("FlowSubject", TestSubject::Make()), Item("FlowSubjectParametrised", Parametrised()),
+	    MakeFrame({Item("FlowSubject", TestSubject::Make()), Item("FlowSubjectParametrised", Parametrised()),
 	        Item("FlowSubjectDynamicParameters", TestSubject::MakePose())});
 };
 
@@ -175,7 +175,7 @@ TEST_F(SceneTransform, ListsTakeTheirSubjectsAndPlaces)
 	EXPECT_TRUE(list.Subjects().empty());
 	EXPECT_EQ(props.Subjects().size(), 1u);
 
-	const auto pOther = Frame({Item("FlowSubjectForSolving", TestSubject::Make())});
+	const auto pOther = MakeFrame({Item("FlowSubjectForSolving", TestSubject::Make())});
 	props.Update(*pOther, context, nullptr);
 	EXPECT_EQ(props.Subjects().size(), 1u) << "a frame without its items leaves it";
 	pOther->AddItem(Item("FlowSubjectSettings", VSubjectSettings{TestSubject::c_Id, true}));

@@ -1,6 +1,6 @@
 #include "PicturesFixture.h"
 
-#include "../OrlexGraphics/Allocations.h"
+#include "../Allocations.h"
 #include "Flow2Graphics/FlowRenderForcePlates.h"
 #include "Flow2Graphics/FlowRenderGeometry.h"
 #include "Flow2Graphics/FlowRenderReconstructionVolume.h"
@@ -22,7 +22,7 @@ namespace
 {
 
 using namespace Flow2Graphics;
-using TestSubject::Frame;
+using TestSubject::MakeFrame;
 
 /// What stands on a stage without subjects.
 class StagePictures : public VPicturesTest
@@ -40,7 +40,7 @@ protected:
 		const NVX::CountedPointer<TesselPluginInterface::IFlowItem> pItem(new InMemoryHost::VFlowItem<T>(i_pFlowType));
 		TesselPluginInterface::SetItemValue(pItem, std::make_shared<const T>(i_rValue));
 		m_Items.push_back(pItem);
-		m_pScene->SetFrame(Frame(m_Items));
+		m_pScene->SetFrame(MakeFrame(m_Items));
 	}
 
 	/// The frame that was drawn last, once more. The first ones make the driver compile its shaders.

@@ -18,8 +18,8 @@ using namespace Flow2Graphics;
 using namespace Flow2TypesUtils;
 using OrlexGraphics::VFloor;
 using OrlexGraphics::VVolume;
-using TestSubject::Frame;
 using TestSubject::Item;
+using TestSubject::MakeFrame;
 
 namespace
 {
@@ -86,7 +86,7 @@ TEST_F(StageTypes, FloorIsTheMeasuredOneOrLiesBelowTheSubjects)
 	const VFloor byOptions{-3000, -3000, 3000, 3000};
 	const auto floor = [&](const std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>>& i_rItems)
 	{
-		type.UpdateStatic(*Frame(i_rItems));
+		type.UpdateStatic(*MakeFrame(i_rItems));
 		return m_pFloor->GetFloor(OrlexGraphics::VSceneOptions());
 	};
 	EXPECT_EQ(floor({}), byOptions);
@@ -132,7 +132,7 @@ TEST_F(StageTypes, VolumesComeFromTheParametersOfTheirGroup)
 	{
 		SCOPED_TRACE(rRow.m_pName);
 		m_Volumes.UpdateStatic(
-		    *Frame({Item(FlowParametersItem::c_pName, FlowParametersItem{rRow.m_pSet, rRow.m_pTag, {}})}));
+		    *MakeFrame({Item(FlowParametersItem::c_pName, FlowParametersItem{rRow.m_pSet, rRow.m_pTag, {}})}));
 		m_pManipulator->Synchronise();
 		m_pHotspot->Synchronise();
 		EXPECT_EQ(m_pVolume->Volume(), rRow.m_bVolume ? expected : std::nullopt);
@@ -147,7 +147,7 @@ TEST_F(StageTypes, ParametersOfOneRevisionAreTakenOnce)
 {
 	FlowParametersItem item{Volume("Recon", 10.0f), "Processing:Reconstruction", {}};
 	const auto update = [&](const FlowParametersItem& i_rItem)
-	{ m_Volumes.UpdateStatic(*Frame({Item(FlowParametersItem::c_pName, i_rItem)})); };
+	{ m_Volumes.UpdateStatic(*MakeFrame({Item(FlowParametersItem::c_pName, i_rItem)})); };
 	update(item);
 	m_pVolume->SetVolume({});
 	update(item);

@@ -82,7 +82,7 @@ CoreOrlexTypes::VSubjectDynamicParameters MakePose()
 	return {c_Id, {0, 0, 1.5707963267948966, 10, 20, 30, 0, 0, 0, 0}};
 }
 
-NVX::CountedPointer<TesselPluginInterface::IFlowFrame> Frame(
+NVX::CountedPointer<TesselPluginInterface::IFlowFrame> MakeFrame(
     const std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>>& i_rItems)
 {
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pFrame(new InMemoryHost::VFlowFrame);

@@ -50,7 +50,7 @@ NVX::CountedPointer<TesselPluginInterface::IFlowItem> Item(const char* i_pFlowTy
 	return pItem;
 }
 
-NVX::CountedPointer<TesselPluginInterface::IFlowFrame> Frame(
+NVX::CountedPointer<TesselPluginInterface::IFlowFrame> MakeFrame(
     const std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>>& i_rItems);
 
 } // namespace TestSubject

@@ -48,7 +48,7 @@ protected:
 
 	void Pose(const CoreOrlexTypes::VSubjectDynamicParameters& i_rPose)
 	{
-		m_pStage->SetFrame(TestSubject::Frame({Item("FlowSubjectForSolving", TestSubject::Make()),
+		m_pStage->SetFrame(TestSubject::MakeFrame({Item("FlowSubjectForSolving", TestSubject::Make()),
 		    Item("FlowSubjectApplicationDataForSolving", TestSubject::MakeData()),
 		    Item("FlowSubjectDynamicParametersForSolving", i_rPose)}));
 	}

@@ -1,14 +1,13 @@
-#include "../CoreGraphics/OffscreenContext.h"
-#include "Allocations.h"
+#include "../Allocations.h"
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/SelectionId.h"
 #include "OrlexGraphics/FrameRenderer.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SphereHelper.h"
+#include "SceneFixture.h"
 #include "ViewFixture.h"
 
 #include <QImage>
-#include <QOpenGLFramebufferObject>
 
 #include <cmath>
 #include <thread>
@@ -78,28 +77,18 @@ public:
 	std::shared_ptr<VSpheres> m_pSpheres;
 };
 
-class Offscreen : public GraphicsTest::InBothDialects
+class Offscreen : public VSceneTest
 {
 protected:
+	Offscreen() : VSceneTest(QSize(200, 160)) {}
+
 	void SetUp() override
 	{
-		ASSERT_NO_FATAL_FAILURE(InBothDialects::SetUp());
-		m_pScene = std::make_shared<VSphereScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false);
+		ASSERT_NO_FATAL_FAILURE(VSceneTest::SetUp());
+		m_pScene = Show<VSphereScene>();
 		m_pScene->m_Size = m_Size;
-		m_Renderer.Initialise();
-		m_Renderer.m_Input.m_Camera.m_Type = CoreGraphics::ECameraFront;
-		m_Renderer.m_Input.m_Camera.SetSize(m_Size);
-		m_Renderer.SetScene(m_pScene);
-		m_Renderer.SetSize(m_Size);
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(m_Size, m_Renderer.TargetFormat());
-	}
-
-	void Frame()
-	{
-		m_pScene->SetNeedsRefresh();
-		m_pScene->Synchronise();
-		m_Renderer.Update();
-		m_Renderer.Render(*m_pTarget);
+		Camera().m_Type = CoreGraphics::ECameraFront;
+		Camera().SetSize(m_Size);
 	}
 
 	std::vector<std::uint32_t> Pick(const QPoint& i_rMouse, std::optional<QPoint> i_Start = {})
@@ -116,14 +105,7 @@ protected:
 		return indices;
 	}
 
-	const QSize m_Size{200, 160};
-	const std::shared_ptr<VEventLoopDispatcher> m_pDispatcher = std::make_shared<VEventLoopDispatcher>();
-	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
-	    std::make_shared<InMemoryHost::VSelectionManager>();
-	const std::shared_ptr<CoreGraphics::VShaderLibrary> m_pShaders = std::make_shared<CoreGraphics::VShaderLibrary>();
 	std::shared_ptr<VSphereScene> m_pScene;
-	VFrameRenderer m_Renderer;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 };
 
 INSTANTIATE_IN_BOTH_DIALECTS(Offscreen);
@@ -137,7 +119,7 @@ TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
 	const bool bES2 = GetParam() == GraphicsTest::EDialect::ES2;
 	for (const bool bCameraView : {true, false})
 	{
-		m_Renderer.m_Input.m_Options.m_bCameraView = bCameraView;
+		Options().m_bCameraView = bCameraView;
 		const QOpenGLFramebufferObjectFormat format = m_Renderer.TargetFormat();
 		EXPECT_EQ(format.samples(), bES2 || bCameraView ? 0 : 4);
 		EXPECT_EQ(format.attachment(), QOpenGLFramebufferObject::Depth);
@@ -172,11 +154,10 @@ TEST_P(Offscreen, PicksRectanglesExactlyOrThroughLayers)
 	for (const std::uint32_t type : {CoreGraphics::ECameraFront, CoreGraphics::ECameraPerspective})
 	{
 		// From the front, 4 mm a pixel in the plane of the boxes. Its scale of an exact pick is below a half.
-		CoreGraphics::VCameraController& rCamera = m_Renderer.m_Input.m_Camera;
-		rCamera.m_Type = type;
-		rCamera.m_Pitch = -90.0f;
-		rCamera.m_Yaw = 180.0f;
-		rCamera.m_Distance = 772.5f;
+		Camera().m_Type = type;
+		Camera().m_Pitch = -90.0f;
+		Camera().m_Yaw = 180.0f;
+		Camera().m_Distance = 772.5f;
 		Frame();
 		for (const auto& rRow : rows)
 			for (const bool bExact : {false, true})
@@ -256,7 +237,7 @@ TEST_P(Offscreen, GoesOnInAContextThatSharesNothing)
 	{
 		VFrameRenderer renderer;
 		renderer.Initialise();
-		renderer.m_Input.m_Camera = m_Renderer.m_Input.m_Camera;
+		renderer.m_Input.m_Camera = Camera();
 		renderer.SetScene(m_pScene);
 		renderer.SetSize(m_Size);
 		QOpenGLFramebufferObject target(m_Size, renderer.TargetFormat());

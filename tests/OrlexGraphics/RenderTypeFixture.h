@@ -1,17 +1,14 @@
 #pragma once
 
-#include "../CoreGraphics/OffscreenContext.h"
+#include "../CoreGraphics/DrawingFixture.h"
 
 #include "CoreGraphics/CameraController.h"
-#include "CoreGraphics/RenderContext.h"
-#include "CoreGraphics/ShaderLibrary.h"
 #include "InMemoryHost/Selection.h"
 #include "OrlexGraphics/IRenderType.h"
 #include "OrlexGraphics/SceneOptions.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 
 #include <QColor>
-#include <QOpenGLFramebufferObject>
 
 #include <array>
 #include <cstdint>
@@ -20,22 +17,12 @@
 #include <vector>
 
 /// One render type, drawn without a scene.
-class VRenderTypeTest : public GraphicsTest::InBothDialects
+class VRenderTypeTest : public GraphicsTest::VDrawingTest
 {
 protected:
 	using VColour = std::array<int, 3>;
 
-	explicit VRenderTypeTest(const QSize& i_rSize) : m_Size(i_rSize) { m_Camera.SetSize(i_rSize); }
-
-	void SetUp() override
-	{
-		InBothDialects::SetUp();
-		m_Library.InitialiseGL();
-		m_Render.Initialise();
-		m_Render.ResetState();
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(m_Size, QOpenGLFramebufferObject::Depth);
-		m_Render.BindFramebuffer(m_pTarget.get());
-	}
+	explicit VRenderTypeTest(const QSize& i_rSize) : VDrawingTest(i_rSize) { m_Camera.SetSize(i_rSize); }
 
 	/// A frame update begins.
 	void BeginFrame()
@@ -95,16 +82,12 @@ protected:
 		return item;
 	}
 
-	const QSize m_Size;
 	QColor m_Background{40, 40, 40};
 	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
 	    std::make_shared<InMemoryHost::VSelectionManager>();
 	const std::shared_ptr<OrlexGraphics::VSelectionRegistry> m_pRegistry =
 	    std::make_shared<OrlexGraphics::VSelectionRegistry>();
-	CoreGraphics::VShaderLibrary m_Library;
-	CoreGraphics::VRenderContext m_Render;
 	CoreGraphics::VCameraController m_Camera;
 	OrlexGraphics::VSceneOptions m_Options;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 	std::vector<std::uint8_t> m_Pixels;
 };

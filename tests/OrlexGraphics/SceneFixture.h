@@ -1,0 +1,51 @@
+#pragma once
+
+#include "../CoreGraphics/OffscreenContext.h"
+
+#include "CoreGraphics/ShaderLibrary.h"
+#include "InMemoryHost/Dispatcher.h"
+#include "InMemoryHost/Selection.h"
+#include "OrlexGraphics/FrameRenderer.h"
+#include "OrlexGraphics/OrlexScene.h"
+
+#include <QOpenGLFramebufferObject>
+
+#include <memory>
+
+/// Frames of a scene, drawn without a window.
+class VSceneTest : public GraphicsTest::InBothDialects
+{
+protected:
+	explicit VSceneTest(const QSize& i_rSize) : m_Size(i_rSize) {}
+
+	template <typename TScene>
+	std::shared_ptr<TScene> Show()
+	{
+		auto pScene = std::make_shared<TScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false);
+		m_Renderer.Initialise();
+		m_Renderer.SetScene(pScene);
+		m_Renderer.SetSize(m_Size);
+		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(m_Size, m_Renderer.TargetFormat());
+		return pScene;
+	}
+
+	OrlexGraphics::VSceneOptions& Options() { return m_Renderer.m_Input.m_Options; }
+	CoreGraphics::VCameraController& Camera() { return m_Renderer.m_Input.m_Camera; }
+
+	/// With what the scene is to show now.
+	void Frame()
+	{
+		m_Renderer.Scene()->SetNeedsRefresh();
+		m_Renderer.Scene()->Synchronise();
+		m_Renderer.Update();
+		m_Renderer.Render(*m_pTarget);
+	}
+
+	const QSize m_Size;
+	const std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
+	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
+	    std::make_shared<InMemoryHost::VSelectionManager>();
+	const std::shared_ptr<CoreGraphics::VShaderLibrary> m_pShaders = std::make_shared<CoreGraphics::VShaderLibrary>();
+	OrlexGraphics::VFrameRenderer m_Renderer;
+	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
+};
