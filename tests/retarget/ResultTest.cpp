@@ -9,16 +9,16 @@
 namespace
 {
 
-using VParsedJson = nlohmann::json;
+using VJson = nlohmann::json;
 
-VParsedJson Result(const std::vector<std::string>& i_rArguments, const VScratchFolder& i_rFolder, int i_Status = 0)
+VJson Result(const std::vector<std::string>& i_rArguments, const VScratchFolder& i_rFolder, int i_Status = 0)
 {
 	const VRun run = RunRetarget(i_rArguments, i_rFolder.Path());
 	EXPECT_EQ(run.m_Status, i_Status) << run.m_Err;
-	return VParsedJson::parse(run.m_Out, nullptr, false);
+	return VJson::parse(run.m_Out, nullptr, false);
 }
 
-void ExpectNear(const VParsedJson& i_rActual, const std::vector<double>& i_rExpected, double i_Tolerance)
+void ExpectNear(const VJson& i_rActual, const std::vector<double>& i_rExpected, double i_Tolerance)
 {
 	ASSERT_EQ(i_rActual.size(), i_rExpected.size());
 	for (std::size_t i = 0; i < i_rExpected.size(); ++i)
@@ -84,16 +84,16 @@ TEST(Fbx, AgreesWithTheReference)
 	{
 		SCOPED_TRACE(rEntry.path().stem().string());
 		std::ifstream stream(rEntry.path());
-		const VParsedJson expected = VParsedJson::parse(stream);
-		const VParsedJson actual =
+		const VJson expected = VJson::parse(stream);
+		const VJson actual =
 		    Result({"fbx", Data("fbx/" + rEntry.path().stem().string() + ".fbx"), "--meshes", "--skin"}, folder);
 		EXPECT_EQ(actual.at("upAxis"), expected.at("upAxis"));
 		EXPECT_EQ(actual.at("unitScale"), expected.at("unitScale"));
 		ASSERT_EQ(actual.at("bones").size(), expected.at("bones").size());
 		for (std::size_t i = 0; i < expected["bones"].size(); ++i)
 		{
-			const VParsedJson& rExpected = expected["bones"][i];
-			const VParsedJson& rActual = actual["bones"][i];
+			const VJson& rExpected = expected["bones"][i];
+			const VJson& rActual = actual["bones"][i];
 			SCOPED_TRACE(rExpected.at("name"));
 			EXPECT_EQ(rActual.at("name"), rExpected.at("name"));
 			EXPECT_EQ(rActual.at("parent"), rExpected.at("parent"));
@@ -111,18 +111,18 @@ TEST(Fbx, AgreesWithTheReference)
 				}
 			}
 		}
-		const VParsedJson& rMeshes = actual.at("placedMeshes");
+		const VJson& rMeshes = actual.at("placedMeshes");
 		ASSERT_EQ(rMeshes.size(), expected.at("placedMeshes").size());
 		std::vector<std::size_t> skinned;
 		for (std::size_t i = 0; i < rMeshes.size(); ++i)
 		{
-			const VParsedJson& rExpected = expected["placedMeshes"][i];
+			const VJson& rExpected = expected["placedMeshes"][i];
 			SCOPED_TRACE(rExpected.at("name"));
 			EXPECT_EQ(rMeshes[i].at("name"), rExpected.at("name"));
 			EXPECT_EQ(rMeshes[i].at("vertexCount"), rExpected.at("uvs"));
 			EXPECT_EQ(rMeshes[i].at("parts").size(), std::max(rExpected.at("materials").get<int>(), 1));
 			int triangles = 0;
-			for (const VParsedJson& rPart : rMeshes[i]["parts"])
+			for (const VJson& rPart : rMeshes[i]["parts"])
 				triangles += rPart.at("triangleCount").get<int>();
 			EXPECT_EQ(triangles, rExpected.at("triangles"));
 			for (std::size_t k = 0; k < 6; ++k)
@@ -132,7 +132,7 @@ TEST(Fbx, AgreesWithTheReference)
 			if (rExpected.at("skinClusters") > 0)
 				skinned.push_back(i);
 		}
-		const VParsedJson& rSkins = actual.at("skin").at("meshes");
+		const VJson& rSkins = actual.at("skin").at("meshes");
 		ASSERT_EQ(rSkins.size(), skinned.size());
 		EXPECT_LE(actual["skin"].at("skeleton").size(), expected.at("bones").size());
 		EXPECT_EQ(actual["skin"]["skeleton"].empty(), skinned.empty());
@@ -141,7 +141,7 @@ TEST(Fbx, AgreesWithTheReference)
 			EXPECT_EQ(rSkins[i].at("vertexCount"), rMeshes[skinned[i]]["vertexCount"]);
 			EXPECT_EQ(rSkins[i].at("partCount"), rMeshes[skinned[i]]["parts"].size());
 			std::size_t vertices = 0;
-			for (const VParsedJson& rCount : rSkins[i].at("influences"))
+			for (const VJson& rCount : rSkins[i].at("influences"))
 				vertices += rCount.get<std::size_t>();
 			EXPECT_EQ(vertices, rSkins[i]["vertexCount"]);
 			EXPECT_EQ(rSkins[i]["influences"][0], 0) << "every vertex is bound";
@@ -154,20 +154,20 @@ TEST(Fbx, AgreesWithTheReference)
 TEST(Dump, SpellsAsTheSchemaDoes)
 {
 	const VScratchFolder folder;
-	const VParsedJson whole = Result({"dump", c_Performer}, folder);
-	const VParsedJson& rSubject = whole.at("SubjectParametrised");
+	const VJson whole = Result({"dump", c_Performer}, folder);
+	const VJson& rSubject = whole.at("SubjectParametrised");
 	EXPECT_EQ(rSubject.at("Name"), "Template");
 	EXPECT_EQ(rSubject.at("SubjectId"), 0x0FFFFFFF);
 	ASSERT_EQ(rSubject.at("Segments").size(), 31u);
-	const VParsedJson& rArm = rSubject["Segments"][2];
+	const VJson& rArm = rSubject["Segments"][2];
 	EXPECT_EQ(rArm.at("Name"), "LeftUpLeg");
 	EXPECT_EQ(rArm.at("ParentSegmentIndex"), 1);
 	EXPECT_EQ(rArm.at("Joint").at("JointType"), "Ball");
 	EXPECT_EQ(rSubject["Segments"][0]["ParentSegmentIndex"], 0xFFFFFFFF);
-	EXPECT_EQ(whole.at("SubjectApplicationData").at("Segments")[1].at("Colour"), VParsedJson({0, 128, 255, 255}));
+	EXPECT_EQ(whole.at("SubjectApplicationData").at("Segments")[1].at("Colour"), VJson({0, 128, 255, 255}));
 	EXPECT_EQ(whole["SubjectApplicationData"]["Segments"][0]["DrawStyle"], "DrawStyleTetraStripe");
 
-	const VParsedJson evaluated = Result({"dump", "--evaluated", c_Performer}, folder);
+	const VJson evaluated = Result({"dump", "--evaluated", c_Performer}, folder);
 	EXPECT_EQ(evaluated.size(), 1u);
 	ExpectNear(evaluated.at("Subject").at("Segments")[2].at("PreTranslation"), {76.9372, -47.3733, -101.2969}, 1e-9);
 	EXPECT_EQ(evaluated["Subject"]["Segments"][2]["Joint"]["JointType"], "Ball");
@@ -185,11 +185,10 @@ TEST(Dump, LegacyTextAsTheDocumentTakesItIn)
 	EXPECT_NE(run.m_Err.find("warning RetargetSetup: Legacy file: the subject's name 'Hero' becomes 'Template'"),
 	    std::string::npos)
 	    << run.m_Err;
-	const VParsedJson whole = VParsedJson::parse(run.m_Out);
+	const VJson whole = VJson::parse(run.m_Out);
 	EXPECT_EQ(whole.at("SubjectParametrised").at("Name"), "Template");
 	EXPECT_EQ(whole["SubjectParametrised"]["Segments"][0]["Name"], "a\"b");
-	EXPECT_EQ(
-	    whole["SubjectParametrised"]["Segments"][0]["Joint"]["BindPose"], VParsedJson({0.0, 0.0, 0.0, 0.0, 0.0, 7.0}));
+	EXPECT_EQ(whole["SubjectParametrised"]["Segments"][0]["Joint"]["BindPose"], VJson({0.0, 0.0, 0.0, 0.0, 0.0, 7.0}));
 	EXPECT_EQ(whole["SubjectApplicationData"]["Segments"].size(), 1u) << "brought to the subject's length";
 }
 
@@ -216,7 +215,7 @@ ROTATION-OBSERVATION="aim"/></Targets></TargetSet></KinematicModel>)");
 	const VRun run = RunRetarget({"fk", "arm.qrs"}, folder.Path());
 	EXPECT_EQ(run.m_Err,
 	    "warning retarget: Target #2 \"gaze\" does not fit its type, or has one without kinematics: it is left out\n");
-	const VParsedJson bind = VParsedJson::parse(run.m_Out);
+	const VJson bind = VJson::parse(run.m_Out);
 	ASSERT_EQ(bind.at("segments").size(), 2u);
 	EXPECT_EQ(bind["segments"][1].at("name"), "arm");
 	ExpectNear(bind["segments"][0].at("rotation"), {0, -1, 0, 1, 0, 0, 0, 0, 1}, 1e-12);
@@ -232,11 +231,11 @@ ROTATION-OBSERVATION="aim"/></Targets></TargetSet></KinematicModel>)");
 	ASSERT_EQ(bind.at("rotations").size(), 2u);
 	EXPECT_EQ(bind["rotations"][0].at("name"), "look");
 	EXPECT_EQ(bind["rotations"][0].at("valid"), false);
-	EXPECT_EQ(bind["rotations"][0].at("rotation"), VParsedJson({1.0, 0.0, 0.0, 0.0, 1.0, 0.0, 0.0, 0.0, 1.0}));
+	EXPECT_EQ(bind["rotations"][0].at("rotation"), VJson({1.0, 0.0, 0.0, 0.0, 1.0, 0.0, 0.0, 0.0, 1.0}));
 	EXPECT_EQ(bind["rotations"][1].at("valid"), true);
 	ExpectNear(bind["rotations"][1].at("rotation"), {0, 1, 0, -1, 0, 0, 0, 0, 1}, 1e-12);
 
-	const VParsedJson own = Result({"fk", "arm.qrs", "--state", "0,0,0,0,0,0,-1.5707963267948966"}, folder);
+	const VJson own = Result({"fk", "arm.qrs", "--state", "0,0,0,0,0,0,-1.5707963267948966"}, folder);
 	ExpectNear(own["segments"][1]["translation"], {100, 0, 0}, 1e-12);
 	ExpectNear(own["markers"][2]["position"], {100, -50, 0}, 1e-12);
 
@@ -292,7 +291,7 @@ ROTATION-OBSERVATION="base" HIDDEN="false"/>
 
 	const VRun run = RunRetarget({"targets", "kinds.qrr", "--source", "source.qrs", "--json"}, folder.Path());
 	EXPECT_EQ(run.m_Status, 0) << run.m_Err;
-	const VParsedJson targets = VParsedJson::parse(run.m_Out, nullptr, false);
+	const VJson targets = VJson::parse(run.m_Out, nullptr, false);
 	ASSERT_EQ(targets.size(), 8u);
 	struct VRow
 	{
@@ -311,7 +310,7 @@ ROTATION-OBSERVATION="base" HIDDEN="false"/>
 	        VRow{"point behind a post pose", 3.0, {}, std::hypot(3.0, 18.0)}})
 	{
 		SCOPED_TRACE(rRow.m_pName);
-		const VParsedJson& rTarget = targets[i++];
+		const VJson& rTarget = targets[i++];
 		const auto expect = [&](const char* i_pKey, const std::optional<double>& i_rExpected)
 		{
 			ASSERT_EQ(rTarget.at(i_pKey).is_null(), !i_rExpected) << i_pKey << " " << rTarget.at(i_pKey);

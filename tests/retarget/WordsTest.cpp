@@ -101,10 +101,10 @@ TEST(Elements, ReadsNumbersThatAreFiniteOnly)
 
 TEST(Output, JsonHoldsWhatTextAndNumbersMayBe)
 {
-	VJson json = VJson::object();
+	CommandLine::VJson json = CommandLine::VJson::object();
 	json["list"] = {1.5, std::numeric_limits<double>::quiet_NaN(), -std::numeric_limits<double>::infinity()};
 	json["text"] = "a\xFF\"b";
-	json["empty"] = VJson::array();
+	json["empty"] = CommandLine::VJson::array();
 	EXPECT_EQ(
 	    JsonText(json), "{\n \"list\": [1.5, null, null],\n \"text\": \"a\xEF\xBF\xBD\\\"b\",\n \"empty\": []\n}");
 }
