@@ -1,6 +1,6 @@
 #pragma once
 
-#include "FbxFileBuilder.h"
+#include "../fbxsdk/FbxFileBuilder.h"
 
 /// Writes small FBX files with one mesh for tests, in every form of the format.
 namespace FbxTest

@@ -21,7 +21,7 @@ protected:
 	template <typename TScene>
 	std::shared_ptr<TScene> Show()
 	{
-		auto pScene = std::make_shared<TScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false);
+		auto pScene = std::make_shared<TScene>(m_pShaders, m_pSelection, m_pSkinCache, m_pDispatcher, false);
 		m_Renderer.Initialise();
 		m_Renderer.SetScene(pScene);
 		m_Renderer.SetSize(m_Size);
@@ -46,6 +46,8 @@ protected:
 	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
 	    std::make_shared<InMemoryHost::VSelectionManager>();
 	const std::shared_ptr<CoreGraphics::VShaderLibrary> m_pShaders = std::make_shared<CoreGraphics::VShaderLibrary>();
+	/// Null unless a test makes one before it shows a scene.
+	std::shared_ptr<OrlexGraphics::VSkinCache> m_pSkinCache;
 	OrlexGraphics::VFrameRenderer m_Renderer;
 	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 };

@@ -2,8 +2,8 @@
 
 #include "CoreGraphics/Skin.h"
 #include "DebugServices/GlobalLog.h"
+#include "HeldJobs.h"
 #include "InMemoryHost/Dispatcher.h"
-#include "TesselPluginInterface/IJobRunner.h"
 
 #include <QTest>
 #include <boost/filesystem/operations.hpp>
@@ -18,28 +18,6 @@ using boost::filesystem::path;
 using CoreGraphics::VSkin;
 using OrlexGraphics::VSkinCache;
 namespace SkinStatus = OrlexGraphics::SkinStatus;
-
-/// A background whose jobs run when the test says so.
-class VHeldJobs : public TesselPluginInterface::IJobRunner
-{
-public:
-	void Run(std::function<void()> i_Job, std::function<void()> i_Completion,
-	    std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher) override
-	{
-		m_Jobs.push_back(
-		    [=]
-		    {
-			    i_Job();
-			    i_pDispatcher->Post(i_Completion);
-		    });
-	}
-	void RunAll()
-	{
-		for (const auto& rJob : std::exchange(m_Jobs, {}))
-			rJob();
-	}
-	std::vector<std::function<void()>> m_Jobs;
-};
 
 struct VHeldDelay : OrlexGraphics::IDelay
 {

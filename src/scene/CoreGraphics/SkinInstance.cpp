@@ -171,6 +171,9 @@ void VSkinInstance::MakeDrivers()
 
 void VSkinInstance::WarnOfMismatches() const
 {
+	// The one without meshes was told of when it was read.
+	if (m_pSkin->Meshes().empty())
+		return;
 	const FBXIO::VSkinSkeleton& rSkeleton = *m_pSkin->Skeleton();
 	if (std::all_of(m_SegmentToBone.begin(), m_SegmentToBone.end(), [](std::int64_t i_Bone) { return i_Bone < 0; }))
 		m_pSkin->WarnOnce(

@@ -23,6 +23,9 @@ namespace
 constexpr float c_SubjectRadius = 1000.0f;
 constexpr float c_StickRadius = 3.0f;
 constexpr float c_SingleBone = 100.0f;
+/// What clusters of markers on a subject look like, and the one segment that they have.
+constexpr const char* c_pClusterSkin = "OrlexBeacon";
+constexpr const char* c_pClusterSegment = "root";
 /// Half of the diagonals of an origin plate and of a target's box.
 constexpr float c_OriginReach = 54.0f;
 constexpr float c_TargetReach = 0.8660254f * c_TargetEdge;
@@ -70,7 +73,12 @@ void VFlowRenderSubject::Build()
 	{
 	}
 	if (m_pKinematics)
+	{
 		m_State.resize(m_pKinematics->NumberOfStates());
+		for (std::size_t i = 0; i < m_pSubject->m_Targets.size(); ++i)
+			if (m_pSubject->m_Targets[i].m_Type == VSubject::VTarget::ERigidBody)
+				m_Clusters.push_back(i);
+	}
 	else
 		NVX_LOG("Tessel", NVX::ELogError,
 		    "The subject %1% is not shown: its segments, joints or targets contradict each other", m_pSubject->m_Name);
@@ -111,8 +119,12 @@ void VFlowRenderSubject::Update(
 
 bool VFlowRenderSubject::BindSkins(OrlexGraphics::VSkinCache& io_rCache)
 {
-	if (m_pData->m_Skin.empty())
-		return true;
+	const bool bMain = m_pData->m_Skin.empty() || BindMainSkin(io_rCache);
+	return BindClusterSkins(io_rCache) && bMain;
+}
+
+bool VFlowRenderSubject::BindMainSkin(OrlexGraphics::VSkinCache& io_rCache)
+{
 	std::shared_ptr<CoreGraphics::VSkin> pSkin;
 	const std::uint32_t status = io_rCache.GetSkin(pSkin, m_pData->m_Skin, OrlexGraphics::c_pSubjectSkins);
 	if (status == OrlexGraphics::SkinStatus::c_Loading)
@@ -135,14 +147,46 @@ bool VFlowRenderSubject::BindSkins(OrlexGraphics::VSkinCache& io_rCache)
 	return true;
 }
 
+bool VFlowRenderSubject::BindClusterSkins(OrlexGraphics::VSkinCache& io_rCache)
+{
+	if (m_Clusters.empty())
+		return true;
+	std::shared_ptr<CoreGraphics::VSkin> pSkin;
+	if (io_rCache.GetSkin(pSkin, c_pClusterSkin, OrlexGraphics::c_pSubjectSkins)
+	    == OrlexGraphics::SkinStatus::c_Loading)
+		return false;
+	m_pRenderData->m_ClusterSkins.clear();
+	if (!pSkin)
+		return true;
+	for (const std::size_t cluster : m_Clusters)
+	{
+		CoreGraphics::VSkinInstance& rInstance = m_pRenderData->m_ClusterSkins.emplace_back();
+		rInstance.Bind(pSkin, {c_pClusterSegment}, {QVector3D()});
+		const QVector4D colour = ToColour(ColourOf(m_pData->m_Targets, cluster));
+		rInstance.SetUserColours(colour, colour);
+	}
+	return true;
+}
+
 void VFlowRenderSubject::UpdateSkins()
 {
 	m_pRenderData->m_bSkin = m_pRenderData->m_pSkin || !m_pRenderData->m_ClusterSkins.empty();
-	if (!m_pRenderData->m_pSkin)
-		return;
-	for (std::size_t i = 0; i < m_SegmentHealth.size(); ++i)
-		m_pRenderData->m_pSkin->SetHealth(i, m_SegmentHealth[i]);
-	m_pRenderData->m_pSkin->UpdatePose(m_SegmentMatrices);
+	if (m_pRenderData->m_pSkin)
+	{
+		for (std::size_t i = 0; i < m_SegmentHealth.size(); ++i)
+			m_pRenderData->m_pSkin->SetHealth(i, m_SegmentHealth[i]);
+		m_pRenderData->m_pSkin->UpdatePose(m_SegmentMatrices);
+	}
+	for (std::size_t i = 0; i < m_pRenderData->m_ClusterSkins.size(); ++i)
+	{
+		const VSubject::VTarget& rTarget = m_pSubject->m_Targets[m_Clusters[i]];
+		const auto state = [&rTarget](std::size_t i_At) {
+			return Rotation::VVector3{rTarget.m_State[i_At], rTarget.m_State[i_At + 1], rTarget.m_State[i_At + 2]};
+		};
+		const QMatrix4x4 pose =
+		    m_SegmentMatrices[rTarget.m_SegmentIndices[0]] * ToMatrix(Rotation::PoseFromAngleAxis(state(3), state(0)));
+		m_pRenderData->m_ClusterSkins[i].UpdatePose({&pose, 1});
+	}
 }
 
 void VFlowRenderSubject::TakeMatrices(const QMatrix4x4& i_rSceneTransform)

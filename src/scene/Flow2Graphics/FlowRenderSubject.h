@@ -80,6 +80,8 @@ private:
 	void CheckHealth(const CoreOrlexTypes::VSubject::VTarget& i_rTarget);
 	void FillSegments(OrlexGraphics::VSelectionRegistry& io_rRegistry);
 	void FillBone(std::size_t i_Index);
+	bool BindMainSkin(OrlexGraphics::VSkinCache& io_rCache);
+	bool BindClusterSkins(OrlexGraphics::VSkinCache& io_rCache);
 	/// The pose and the health of the segments, for the skins.
 	void UpdateSkins();
 
@@ -90,6 +92,8 @@ private:
 	std::unique_ptr<ComputeSubject::VComputeSubjectFK> m_pKinematics;
 	std::vector<float> m_Radii;
 	std::vector<bool> m_Origins;
+	/// Targets that are rigid bodies: clusters of markers.
+	std::vector<std::size_t> m_Clusters;
 	std::vector<std::string> m_SegmentNames;
 	std::vector<std::string> m_MarkerNames;
 

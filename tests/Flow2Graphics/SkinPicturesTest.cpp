@@ -1,0 +1,242 @@
+#include "PicturesFixture.h"
+
+#include "../FBXIO/MeshFile.h"
+#include "../Allocations.h"
+#include "../OrlexGraphics/HeldJobs.h"
+#include "CoreGraphics/RenderContext.h"
+#include "DebugServices/GlobalLog.h"
+#include "Flow2Graphics/SubjectTypes.h"
+#include "OrlexGraphics/IRenderType.h"
+#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/SkinRenderer.h"
+#include "TestSubject.h"
+
+#include <QTemporaryDir>
+
+#include <fstream>
+
+namespace
+{
+
+using namespace FbxTest;
+using TestSubject::Item;
+
+/// A box about a place, in one material, that goes with one bone; each face shows the whole texture.
+VTestMesh Box(int i_Node, int i_Bone, const QVector3D& i_rMiddle, VTestMaterial i_Material)
+{
+	constexpr double c_Edge = 30.0;
+	VTestMesh mesh;
+	mesh.m_Node = i_Node;
+	mesh.m_UV = {"ByPolygonVertex", "IndexToDirect", {}, {}};
+	mesh.m_MaterialLayer = {"AllSame", "IndexToDirect", {}, {0}};
+	mesh.m_Materials = {std::move(i_Material)};
+	VTestCluster cluster{i_Bone, {}, {}, {}, {}};
+	for (int axis = 0; axis < 3; ++axis)
+		for (const double side : {1.0, -1.0})
+			for (int corner = 0; corner < 4; ++corner)
+			{
+				// Counted so that the face looks outwards.
+				const double u = corner == 1 || corner == 2 ? 1.0 : -1.0;
+				const double v = corner >= 2 ? 1.0 : -1.0;
+				double place[3];
+				place[axis] = side * c_Edge;
+				place[(axis + 1) % 3] = u * side * c_Edge;
+				place[(axis + 2) % 3] = v * c_Edge;
+				const int point = int(mesh.m_Points.size() / 3);
+				for (int k = 0; k < 3; ++k)
+					mesh.m_Points.push_back(place[k] + double(i_rMiddle[k]));
+				mesh.m_Polygons.push_back(corner == 3 ? -point - 1 : point);
+				mesh.m_UV.m_Direct.insert(mesh.m_UV.m_Direct.end(), {u * 0.5 + 0.5, v * 0.5 + 0.5});
+				mesh.m_UV.m_Index.push_back(point);
+				cluster.m_Points.push_back(point);
+				cluster.m_Weights.push_back(1.0);
+			}
+	const double x = double(i_rMiddle.x()), y = double(i_rMiddle.y()), z = double(i_rMiddle.z());
+	cluster.m_Link = {1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, x, y, z, 1};
+	cluster.m_Transform = {1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, -x, -y, -z, 1};
+	mesh.m_Clusters = {std::move(cluster)};
+	return mesh;
+}
+
+class SkinPictures : public VPicturesTest
+{
+protected:
+	void SetUp() override
+	{
+		m_pSkinCache = NVX::MakeShared<OrlexGraphics::VSkinCache>(m_pDispatcher, m_pJobs);
+		ASSERT_NO_FATAL_FAILURE(VPicturesTest::SetUp());
+		Options().m_LabellingSubject.m_bEnabled = false;
+		OrlexGraphics::VSubjectOptions& rOptions = Options().m_SolvingSubject;
+		rOptions.m_bMarkers = rOptions.m_bSticks = rOptions.m_bMissingMarkers = rOptions.m_bBones = false;
+		WriteSkin("Boxes", {1, 0, 0});
+	}
+	void TearDown() override { m_pSkinCache->Dispose(); }
+
+	/// Three boxes in the proportions of the subject: one colour, half transparent, and with a texture.
+	void WriteSkin(const char* i_pName, const VNumbers& i_rColour)
+	{
+		VTestScene scene;
+		scene.m_Settings = {{"UnitScaleFactor", {0.1}}};
+		const auto add = [&scene](const char* i_pNode, const char* i_pKind, int i_Parent, const VNumbers& i_rPlace) {
+			scene.m_Nodes.push_back({i_pNode, i_pKind, i_Parent, {{"Lcl Translation", i_rPlace}}});
+		};
+		add("Ns:Root", "LimbNode", -1, {0, 0, 0});
+		add("Ns:Spine", "LimbNode", 0, {0, 0, 100});
+		add("Ns:Limb", "LimbNode", 1, {300, 0, 0});
+		for (const char* const pMesh : {"plain", "glass", "texture"})
+			add(pMesh, "Mesh", -1, {0, 0, 0});
+		QImage image(2, 2, QImage::Format_RGB32);
+		image.setPixel(0, 0, 0xff0000ff);
+		image.setPixel(1, 0, 0xffffffff);
+		image.setPixel(0, 1, 0xff00ff00);
+		image.setPixel(1, 1, 0xffff0000);
+		image = image.scaled(64, 64);
+		ASSERT_TRUE(image.save(m_Folder.filePath("texture.png")));
+		const VTestMaterial plain{"phong", {{"DiffuseColor", i_rColour}}, "", ""};
+		const VTestMaterial glass{"phong",
+		    {{"DiffuseColor", {0, 0.5, 1}}, {"TransparentColor", {1, 1, 1}}, {"TransparencyFactor", {0.5}}}, "", ""};
+		const VTestMaterial texture{
+		    "phong", {{"TransparentColor", {1, 1, 1}}, {"TransparencyFactor", {0}}}, "texture.png", "texture.png"};
+		std::ofstream(m_Folder.filePath(QString(i_pName) + ".fbx").toStdString(), std::ios::binary) << Write(c_Forms[1],
+		    scene, {Box(3, 0, {0, 0, 0}, plain), Box(4, 1, {0, 0, 100}, glass), Box(5, 2, {300, 0, 100}, texture)});
+	}
+
+	void Show(const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr,
+	    const CoreOrlexTypes::VColour& i_rTint = {0, 0, 0, 0})
+	{
+		CoreOrlexTypes::VSubjectApplicationData data = TestSubject::MakeData();
+		data.m_Skin = "Boxes";
+		data.m_SkinColourA = data.m_SkinColourB = i_rTint;
+		auto items = std::vector{Item("FlowSubjectForSolving", TestSubject::Make()),
+		    Item("FlowSubjectApplicationDataForSolving", std::move(data)),
+		    Item("FlowSubjectDynamicParametersForSolving", TestSubject::MakePose())};
+		if (i_pLabels)
+			items.push_back(Item("FlowReconstructionLabelSetForSolving", *i_pLabels));
+		m_pScene->SetFrame(TestSubject::MakeFrame(items));
+	}
+	/// Until the skin is on.
+	void Wear()
+	{
+		m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {m_Folder.path().toStdString()});
+		m_pDispatcher->RunPending();
+		Draw(c_View);
+		m_pJobs->RunAll();
+		m_pDispatcher->RunPending();
+	}
+	std::vector<NVX::ISelectionItem> PickAt(const QVector3D& i_rPlace)
+	{
+		Draw(c_View);
+		const CoreGraphics::VCameraController& rCamera = m_Renderer.m_Input.m_Camera;
+		const QVector3D ndc = (rCamera.m_Projection * rCamera.m_View).map(i_rPlace);
+		OrlexGraphics::VPickRequest request;
+		request.m_Mouse = QPoint(int((ndc.x() * 0.5f + 0.5f) * 320.0f), int((0.5f - ndc.y() * 0.5f) * 240.0f));
+		OrlexGraphics::VPick pick;
+		m_Renderer.Pick(request, pick);
+		return pick.m_Items;
+	}
+
+	static constexpr VView c_View{{0, 170, 110}, 460.0f, -65.0f, 60.0f};
+	const QTemporaryDir m_Folder;
+	const std::shared_ptr<VHeldJobs> m_pJobs = std::make_shared<VHeldJobs>();
+};
+INSTANTIATE_IN_BOTH_DIALECTS(SkinPictures);
+
+TEST_P(SkinPictures, OfMaterialsOpaqueAndAsXRay)
+{
+	Show();
+	const QImage bare = Draw(c_View);
+	Wear();
+	Compare(Draw(c_View), "skin");
+	Options().m_SolvingSubject.m_bSkinXRay = true;
+	Compare(Draw(c_View), "skin-xray");
+	Options().m_SolvingSubject.m_bSkin = false;
+	EXPECT_EQ(Draw(c_View), bare);
+	Options().m_SolvingSubject.m_bSkinXRay = false;
+	Options().m_SolvingSubject.m_bSkin = true;
+	Show(nullptr, {0, 255, 255, 128});
+	Compare(Draw(c_View), "skin-tinted");
+	// The limb's marker is missing.
+	const CoreOrlexTypes::VReconstructionLabelSet labels{
+	    {{TestSubject::c_Id, 1, {0, 320, 130}}, {TestSubject::c_Id, 2, {10, 360, 190}}}};
+	Show(&labels);
+	Options().m_SolvingSubject.m_bMissingMarkers = true;
+	Compare(Draw(c_View), "skin-health");
+}
+
+TEST_P(SkinPictures, OfAFileAsItStands)
+{
+	m_pScene->LoadFBXScene(m_Folder.filePath("Boxes.fbx"));
+	const VView view{{150, 0, 60}, 460.0f, -65.0f, -30.0f};
+	const QImage drawn = Draw(view);
+	Compare(drawn, "fbx-scene");
+	Options().m_bFBXScene = false;
+	const QImage nothing = Draw(view);
+	EXPECT_NE(nothing, drawn);
+	Options().m_bFBXScene = true;
+	m_pScene->LoadFBXScene({});
+	EXPECT_EQ(Draw(view), nothing);
+}
+
+TEST_P(SkinPictures, ChangeWithTheFileAndNotBeforeItIsRead)
+{
+	Show();
+	Wear();
+	const QImage red = Draw(c_View);
+	WriteSkin("Boxes", {0, 1, 0});
+	m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {"/", m_Folder.path().toStdString()});
+	m_pDispatcher->RunPending();
+	EXPECT_EQ(Draw(c_View), red) << "worn until the new one is there";
+	m_pJobs->RunAll();
+	EXPECT_NE(Draw(c_View), red);
+}
+
+TEST_P(SkinPictures, ArePickedAsTheSubjectUnlessTheyAreSeenThrough)
+{
+	Show();
+	Wear();
+	Options().m_SolvingSubject.m_bBones = true;
+	const Flow2Graphics::VSubjectSelectionMaker<Flow2Graphics::VFlowSubjectForSolvingTypes> items;
+	const QVector3D skinOverBone(10, 22, 100);
+	EXPECT_EQ(PickAt(skinOverBone), std::vector{items.Subject(TestSubject::c_Id)});
+	Options().m_SolvingSubject.m_bSkinXRay = true;
+	EXPECT_EQ(PickAt(skinOverBone), std::vector{items.Segment(TestSubject::c_Id, TestSubject::ERoot)});
+}
+
+TEST_P(SkinPictures, TakeNoMemoryForAFrameThatDoesNotChange)
+{
+	Show();
+	Wear();
+	for (const bool bXRay : {false, true})
+	{
+		Options().m_SolvingSubject.m_bSkinXRay = bXRay;
+		for (int i = 0; i < 3; ++i)
+			Draw(c_View);
+		const std::size_t before = AllocationCount();
+		m_Renderer.Render(*m_pTarget);
+		EXPECT_EQ(AllocationCount() - before, 0u) << bXRay;
+	}
+}
+
+TEST_P(SkinPictures, AreLeftOutWhereTheDriverHasNoRoom)
+{
+	EXPECT_TRUE(OrlexGraphics::HasRoomForSkins(1024));
+	std::string log;
+	const auto pSink = NVX::GlobalLog::AddSink(
+	    [&log](const NVX::VLogCategory&, int, const std::string& i_rMessage) { log += i_rMessage + "\n"; });
+	m_pShaders->InitialiseGL();
+	OrlexGraphics::VSkinRenderer renderer(*m_pShaders, 256);
+	EXPECT_EQ(log,
+	    "Skins are not shown: they take 1016 uniform vectors of a vertex shader, and the graphics driver has "
+	    "256\n");
+	CoreGraphics::VRenderContext context;
+	context.Initialise();
+	for (int i = 0; i < 2; ++i)
+		EXPECT_FALSE(renderer.BeginRender(context, {}, OrlexGraphics::EPassOpaque));
+	OrlexGraphics::VSkinRenderer here(*m_pShaders);
+	EXPECT_TRUE(here.BeginRender(context, {}, OrlexGraphics::EPassOpaque));
+	EXPECT_FALSE(here.BeginRender(context, {}, OrlexGraphics::EPassTransparent));
+	EXPECT_EQ(log.find("Skins", 10), std::string::npos);
+}
+
+} // namespace
