@@ -13,15 +13,12 @@ varying vec3 v_Normal;
 varying vec3 v_Eye;
 varying vec2 v_UV;
 
-// The square of a length is still a number of medium precision.
-const float c_Metres = 0.001;
-
 void main()
 {
 	vec4 position = u_ModelTransform * vec4(a_position, 1.0);
 	v_Colour = a_colour;
 	v_Normal = ToWorld(u_ModelTransform, a_normal);
-	v_Eye = (position.xyz - u_CameraPosition) * c_Metres;
+	v_Eye = FromCamera(position.xyz, u_CameraPosition);
 	v_UV = a_uv;
 	gl_Position = u_ViewProjection * position;
 }

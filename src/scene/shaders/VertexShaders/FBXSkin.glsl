@@ -16,9 +16,6 @@ varying vec3 v_Normal;
 varying vec3 v_Eye;
 varying vec2 v_UV;
 
-// The square of a length is still a number of medium precision.
-const float c_Metres = 0.001;
-
 vec3 s_Position = vec3(0.0);
 vec3 s_Normal = vec3(0.0);
 float s_Weight = 0.0;
@@ -51,7 +48,7 @@ void main()
 	vec3 position = s_Position / s_Weight;
 	v_Colour = u_HighlightMissing ? vec4(1.0, s_Health, s_Health, 1.0) : vec4(1.0);
 	v_Normal = normalize(s_Normal);
-	v_Eye = (position - u_CameraPosition) * c_Metres;
+	v_Eye = FromCamera(position, u_CameraPosition);
 	v_UV = a_uv;
 	gl_Position = u_ViewProjection * vec4(position, 1.0);
 }
