@@ -2,9 +2,11 @@
 
 #include "../Allocations.h"
 #include "CoreOrlexQRTIO/Reader.h"
+#include "CoreOrlexTypes/SubjectState.h"
 #include "CoreOrlexTypesUtils/PoseVector.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
 #include "Flow2Graphics/SubjectTypes.h"
+#include "Flow2TypesUtils/ItemCatalogue.h"
 #include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "TestSubject.h"
@@ -19,19 +21,22 @@ namespace
 
 using namespace Flow2Graphics;
 using OrlexGraphics::VSubjectOptions;
-using TestSubject::Item;
 
 class Pictures : public VPicturesTest
 {
 protected:
-	/// The small subject as one for solving.
-	void ShowSmall(const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr)
+	/// The small subject as one of a class.
+	void ShowSmall(const VSubjectTypes& i_rTypes = VFlowSubjectForSolvingTypes::c_Types,
+	    const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr)
 	{
-		auto items = std::vector{Item("FlowSubjectForSolving", TestSubject::Make()),
-		    Item("FlowSubjectApplicationDataForSolving", TestSubject::MakeData()),
-		    Item("FlowSubjectDynamicParametersForSolving", TestSubject::MakePose())};
+		std::vector items{Tagged(i_rTypes.m_Subject, TestSubject::Make()),
+		    Tagged(i_rTypes.m_ApplicationData, TestSubject::MakeData()),
+		    Tagged(i_rTypes.m_Pose, TestSubject::MakePose())};
 		if (i_pLabels)
-			items.push_back(Item("FlowReconstructionLabelSetForSolving", *i_pLabels));
+			items.push_back(Tagged(i_rTypes.m_Labels, *i_pLabels));
+		if (i_rTypes.m_Settings)
+			items.push_back(Tagged(i_rTypes.m_Settings,
+			    CoreOrlexTypes::VSubjectSettings{TestSubject::c_Id, i_rTypes.m_Class == ESubjectClassProp}));
 		m_pScene->SetFrame(TestSubject::MakeFrame(items));
 	}
 
@@ -51,17 +56,13 @@ protected:
 			    << i_rPath;
 			CoreOrlexTypes::VSubject subject;
 			CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(parametrised, subject);
-			items.push_back(Item(i_rTypes.m_Class == ESubjectClassSolving ? "FlowSubjectForSolving" : "FlowSubject",
-			    std::move(subject)));
-			items.push_back(Item(i_rTypes.m_Class == ESubjectClassSolving ? "FlowSubjectApplicationDataForSolving"
-			                                                              : "FlowSubjectApplicationData",
-			    std::move(data)));
+			items.push_back(Tagged(i_rTypes.m_Subject, std::move(subject)));
+			items.push_back(Tagged(i_rTypes.m_ApplicationData, std::move(data)));
 			std::vector<double> pose = CoreOrlexTypesUtils::PoseVector(parametrised, i_pStatistic);
 			if (i_bYUp)
 				TurnToYUp(pose);
-			items.push_back(Item(i_rTypes.m_Class == ESubjectClassSolving ? "FlowSubjectDynamicParametersForSolving"
-			                                                              : "FlowSubjectDynamicParameters",
-			    CoreOrlexTypes::VSubjectDynamicParameters{TestSubject::c_Id, std::move(pose)}));
+			items.push_back(
+			    Tagged(i_rTypes.m_Pose, CoreOrlexTypes::VSubjectDynamicParameters{TestSubject::c_Id, std::move(pose)}));
 		};
 		using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
 		add(RETARGET_SOURCE "/demo/performer.qrs", VFlowSubjectTypes::c_Types, &VJoint::m_BindPose);
@@ -70,6 +71,12 @@ protected:
 	}
 
 private:
+	template <typename T>
+	static NVX::CountedPointer<TesselPluginInterface::IFlowItem> Tagged(std::uint32_t i_Tag, T i_Value)
+	{
+		return TestSubject::Item(Flow2TypesUtils::FindItemType(i_Tag)->m_Name, std::move(i_Value));
+	}
+
 	/// Rotation vector and translation of a root without a pose of its own before them.
 	static void TurnToYUp(std::vector<double>& io_rPose)
 	{
@@ -108,6 +115,8 @@ TEST_P(Pictures, OfEachThingThatASubjectIsDrawnAs)
 		std::function<void(VSubjectOptions&)> m_SwitchOn;
 	} c_Rows[] = {
 	    {"origins", [](VSubjectOptions&) {}},
+	    // They show in any case.
+	    {"origins", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bOrigins = false; }},
 	    {"bones", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; }},
 	    {"joints", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bJoints = true; }},
 	    {"axes", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bAxes = true; }},
@@ -132,11 +141,32 @@ TEST_P(Pictures, OfEachThingThatASubjectIsDrawnAs)
 			ASSERT_EQ(nothing.pixel(x, y), 0xff202020u) << x << " " << y;
 }
 
+TEST_P(Pictures, OfEachClassUnderItsOptions)
+{
+	using OrlexGraphics::VSceneOptions;
+	VSubjectOptions VSceneOptions::*const c_Options[ESubjectClassCount] = {&VSceneOptions::m_PropSubject,
+	    &VSceneOptions::m_LabellingSubject, &VSceneOptions::m_PropSubject, &VSceneOptions::m_SolvingSubject,
+	    &VSceneOptions::m_RetargetingSubject};
+	for (const VSubjectTypes& rTypes : c_SubjectTypes)
+	{
+		SCOPED_TRACE(rTypes.m_Class);
+		ShowSmall(rTypes);
+		for (const auto pOptions : c_Options)
+			Options().*pOptions = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bEnabled = false; });
+		VSubjectOptions& rOptions = Options().*c_Options[rTypes.m_Class];
+		rOptions = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; });
+		Compare(Draw(c_Small), "bones");
+		// Those for retargeting have no markers.
+		rOptions = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bMarkers = true; });
+		Compare(Draw(c_Small), rTypes.m_Class == ESubjectClassRetargeting ? "origins" : "markers");
+	}
+}
+
 TEST_P(Pictures, OfMissingMarkers)
 {
 	const CoreOrlexTypes::VReconstructionLabelSet labels{
 	    {{TestSubject::c_Id, 0, {0, 320, 130}}, {TestSubject::c_Id, 1, {10, 360, 190}}}};
-	ShowSmall(&labels);
+	ShowSmall(VFlowSubjectForSolvingTypes::c_Types, &labels);
 	const auto options = [](bool i_bGaps)
 	{
 		return Only(

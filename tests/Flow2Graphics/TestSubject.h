@@ -41,10 +41,10 @@ CoreOrlexTypes::VSubjectDynamicParameters MakePose();
 
 /// An item of any flow type.
 template <typename T>
-NVX::CountedPointer<TesselPluginInterface::IFlowItem> Item(const char* i_pFlowType, T i_Value)
+NVX::CountedPointer<TesselPluginInterface::IFlowItem> Item(const std::string& i_rFlowType, T i_Value)
 {
 	InMemoryHost::VItemFactory factory;
-	const auto pItem = factory.CreateItem(i_pFlowType);
+	const auto pItem = factory.CreateItem(i_rFlowType);
 	if (!TesselPluginInterface::SetItemValue(pItem, std::make_shared<const T>(std::move(i_Value))))
 		return nullptr;
 	return pItem;

@@ -66,7 +66,7 @@ protected:
 
 	NVX::ISelectionItem Segment(std::uint32_t i_Index) const { return m_Items.Segment(TestSubject::c_Id, i_Index); }
 
-	const VSubjectSelectionMaker<VFlowSubjectForSolvingTypes> m_Items;
+	const VSubjectSelectionMaker<VFlowSubjectForSolvingTypes> m_Items{};
 	std::shared_ptr<VStageScene> m_pStage;
 };
 
