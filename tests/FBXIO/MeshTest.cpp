@@ -205,7 +205,9 @@ TEST_P(Mesh, DamageIsToldAndLeftOut)
 	    (VMessages{{3,
 	                   "Polygons left out of mesh " + owner
 	                       + " because they have no end or name control points that do not exist: 2"},
-	        {3, "1 control points of mesh body have coordinates or normals that are no numbers; setting these to zero"}}));
+	        {3,
+	            "1 control points of mesh body have coordinates or normals that are no numbers; setting these to "
+	            "zero"}}));
 }
 
 TEST(MeshArrays, DamageIsToldAndLeavesTheMeshEmpty)

@@ -79,30 +79,36 @@ std::string UnsoundMesh(const FBXIO::VMesh<TVertex>& i_rMesh, std::size_t i_Bone
 }
 
 /// Reads all that the file has; empty if everything is as it must be, else what is not.
-inline std::string WhatIsUnsound(FBXIO::FBXReader& io_rReader)
+inline std::string WhatIsUnsound(
+    FBXIO::FBXReader& io_rReader, std::vector<FBXIO::VPlacedMesh>& o_rPlaced, FBXIO::VSkin& o_rSkin)
 {
 	std::string what = io_rReader.HasSkeleton() ? UnsoundBone(*io_rReader.GetSkeleton()) : std::string();
 	if (!std::isfinite(io_rReader.GetUnitScale()) || io_rReader.GetUnitScale() <= 0.0f)
 		what = "the unit is no length";
-	std::vector<FBXIO::VPlacedMesh> placed;
-	io_rReader.ReadPlacedMeshes(placed);
-	for (const FBXIO::VPlacedMesh& rPlaced : placed)
+	io_rReader.ReadPlacedMeshes(o_rPlaced);
+	for (const FBXIO::VPlacedMesh& rPlaced : o_rPlaced)
 	{
 		if (what.empty())
 			what = UnsoundMesh(rPlaced.m_Mesh, 0);
 		if (what.empty() && !IsFinite(rPlaced.m_Transform))
 			what = "the place of " + rPlaced.m_Name + " is not finite";
 	}
-	FBXIO::VSkin skin;
-	io_rReader.ReadSkin(skin);
-	if (what.empty() && skin.m_pSkeleton)
-		what = UnsoundBone(*skin.m_pSkeleton);
-	if (what.empty() && bool(skin.m_pSkeleton) != io_rReader.HasSkeleton())
+	io_rReader.ReadSkin(o_rSkin);
+	if (what.empty() && o_rSkin.m_pSkeleton)
+		what = UnsoundBone(*o_rSkin.m_pSkeleton);
+	if (what.empty() && bool(o_rSkin.m_pSkeleton) != io_rReader.HasSkeleton())
 		what = "the skin has no skeleton";
-	for (const FBXIO::VSkinMesh& rMesh : skin.m_Meshes)
+	for (const FBXIO::VSkinMesh& rMesh : o_rSkin.m_Meshes)
 		if (what.empty())
-			what = UnsoundMesh(rMesh, skin.m_pSkeleton->size());
+			what = UnsoundMesh(rMesh, o_rSkin.m_pSkeleton->size());
 	return what;
+}
+
+inline std::string WhatIsUnsound(FBXIO::FBXReader& io_rReader)
+{
+	std::vector<FBXIO::VPlacedMesh> placed;
+	FBXIO::VSkin skin;
+	return WhatIsUnsound(io_rReader, placed, skin);
 }
 
 } // namespace FbxTest

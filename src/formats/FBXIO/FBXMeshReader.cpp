@@ -102,18 +102,22 @@ void FBXIO::FBXMeshReader::Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TV
 		}
 		broken += bSound ? 0 : 1;
 	}
-	if (broken > 0)
+	if (broken > 0 && !m_Told.contains(&i_rNode))
 		NVX_LOG("FBXIO", NVX::ELogWarning,
 		    "%1% control points of mesh %2% have coordinates or normals that are no numbers; setting these to zero",
 		    broken, i_rNode.GetName());
 }
 
 template <typename TVertex>
-void FBXIO::FBXMeshReader::Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const
+void FBXIO::FBXMeshReader::Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh)
 {
+	// A mesh may be read placed and once more with its skin.
+	const bool bTell = m_Told.insert(&i_rNode).second;
 	const int* const pVertices = io_rFrom.GetPolygonVertices();
 	std::vector<std::uint32_t> indices(pVertices, pVertices + io_rFrom.GetPolygonVertexCount());
-	ApplyTexCoords(io_rFrom, i_rNode.GetName(), io_rMesh.m_Vertices, indices);
+	ApplyTexCoords(io_rFrom, bTell ? i_rNode.GetName() : nullptr, io_rMesh.m_Vertices, indices);
+	if (bTell && io_rFrom.GetElementMaterialCount() == 0)
+		NVX_LOG("FBXIO", NVX::ELogWarning, "Missing material for mesh %1%", io_rFrom.GetName());
 	if (io_rMesh.m_Vertices.size() < c_FirstLargeCount)
 		SplitIntoParts<std::uint16_t>(io_rFrom, indices, io_rMesh.m_Parts);
 	else
@@ -161,7 +165,7 @@ std::string FBXIO::FBXMeshReader::FindTexture(const FbxFileTexture& i_rTexture) 
 bool FBXIO::FBXMeshReader::ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh)
 {
 	FbxMesh* const pMesh = i_rNode.GetMesh();
-	if (!pMesh)
+	if (!pMesh || !Take(i_rNode, *pMesh, sizeof(VBasicVertex)))
 		return false;
 	Prepare(i_rNode, *pMesh, o_rMesh);
 	Finish(i_rNode, *pMesh, o_rMesh);
@@ -180,18 +184,37 @@ void FBXIO::FBXMeshReader::ReadPlacedMesh(FbxNode& i_rNode, std::vector<VPlacedM
 		io_rMeshes.push_back(std::move(placed));
 }
 
-std::int64_t FBXIO::FBXMeshReader::FindBone(FbxCluster& i_rCluster) const
+bool FBXIO::FBXMeshReader::Take(
+    FbxNode& i_rNode, FbxMesh& io_rFrom, std::size_t i_VertexSize, std::uint64_t i_MoreBytes)
+{
+	FbxGeometryElementUV* const pUV = io_rFrom.GetElementUV(0);
+	const std::uint64_t vertices =
+	    std::uint64_t(io_rFrom.GetControlPointsCount()) + (pUV ? pUV->GetDirectArray().GetCount() : 0);
+	// Of each polygon vertex one index, and the indices of a triangle.
+	const std::uint64_t bytes =
+	    i_MoreBytes + vertices * i_VertexSize + io_rFrom.GetPolygonVertexCount() * std::uint64_t(16);
+	const bool bEnough = bytes <= m_BytesLeft;
+	if (bEnough)
+		m_BytesLeft -= bytes;
+	else if (m_Told.insert(&i_rNode).second)
+		NVX_LOG("FBXIO", NVX::ELogWarning, "Mesh %1% left out because the meshes of the file are too large",
+		    i_rNode.GetName());
+	return bEnough;
+}
+
+std::int64_t FBXIO::FBXMeshReader::FindBone(FbxCluster& i_rCluster)
 {
 	if (const auto found = m_BoneOfName.find(i_rCluster.GetLink()->GetName()); found != m_BoneOfName.end())
 		return found->second;
-	NVX_LOG("FBXIO", NVX::ELogError, "Missing bone %1% for cluster %2%", i_rCluster.GetLink()->GetName(),
-	    i_rCluster.GetName());
+	if (m_Searched.insert(&i_rCluster).second)
+		NVX_LOG("FBXIO", NVX::ELogError, "Missing bone %1% for cluster %2%", i_rCluster.GetLink()->GetName(),
+		    i_rCluster.GetName());
 	return -1;
 }
 
-void FBXIO::FBXMeshReader::FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t>& io_rBones) const
+void FBXIO::FBXMeshReader::FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t>& io_rBones)
 {
-	if (FbxSkin* const pSkin = FindSkin(i_rNode))
+	if (FbxSkin* const pSkin = FindSkin(i_rNode); pSkin && m_Searched.insert(pSkin).second)
 		ForEachCluster(*pSkin,
 		    [&](FbxCluster& i_rCluster)
 		    {
@@ -216,6 +239,7 @@ std::shared_ptr<const VSkinSkeleton> FBXIO::FBXMeshReader::PruneSkeleton(std::se
 		if (std::int64_t& rParent = pPruned->back().m_ParentIndex; rParent >= 0)
 			rParent = newIndex.at(rParent);
 	}
+	m_Searched.clear();
 	SetSkeleton(pPruned);
 	return pPruned;
 }
@@ -247,6 +271,12 @@ void FBXIO::FBXMeshReader::ReadSkinMesh(FbxNode& i_rNode, std::vector<VSkinMesh>
 	FbxSkin* const pSkin = FindSkin(i_rNode);
 	FbxMesh* const pMesh = pSkin && m_pSkeleton ? i_rNode.GetMesh() : nullptr;
 	if (!pMesh)
+		return;
+	std::uint64_t bytes = 0;
+	ForEachCluster(*pSkin,
+	    [&bytes](FbxCluster& i_rCluster)
+	    { bytes += Limits::c_ClusterBytes + i_rCluster.GetControlPointIndicesCount() * std::uint64_t(8); });
+	if (!Take(i_rNode, *pMesh, sizeof(VSkinVertex), bytes))
 		return;
 	VBoundClusters clusters;
 	ForEachCluster(*pSkin,

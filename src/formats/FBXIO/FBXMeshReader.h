@@ -1,6 +1,7 @@
 #pragma once
 
 #include "FBXIO/ImageCache.h"
+#include "FBXIO/Limits.h"
 #include "FBXIO/Mesh.h"
 
 #include <fbxsdk.h>
@@ -27,13 +28,17 @@ public:
 
 	static bool IsMesh(FbxNode& i_rNode);
 
+	/// Before all meshes of the scene are read once more: they count against the limit from here on.
+	void BeginMeshes() { m_BytesLeft = Limits::c_MeshBytes; }
+
 	/// In the node's own space. False if the mesh is damaged.
 	bool ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh);
 
 	void ReadPlacedMesh(FbxNode& i_rNode, std::vector<VPlacedMesh>& io_rMeshes);
 
-	/// Adds the bones that the node's skin is bound to, with all their parents.
-	void FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t>& io_rBones) const;
+	/// Adds the bones that the node's skin is bound to, with all their parents. A skin that several nodes share is
+	/// looked at once.
+	void FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t>& io_rBones);
 
 	/// Makes the skeleton of these bones and of all below them, and goes on with it.
 	std::shared_ptr<const VSkinSkeleton> PruneSkeleton(std::set<std::int64_t> i_Bones);
@@ -45,19 +50,26 @@ private:
 	template <typename TVertex>
 	void Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& o_rMesh);
 	template <typename TVertex>
-	void Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh) const;
+	void Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh);
+	/// False, and told, if the mesh is beyond the limit.
+	bool Take(FbxNode& i_rNode, FbxMesh& io_rFrom, std::size_t i_VertexSize, std::uint64_t i_MoreBytes = 0);
 	void ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPart& io_rPart);
 	std::string FindTexture(const FbxFileTexture& i_rTexture) const;
 	/// 0, and told, if the skeleton has no bone of the link's name.
 	std::int64_t BindBone(FbxCluster& i_rCluster);
-	/// -1, and told, if the skeleton has none.
-	std::int64_t FindBone(FbxCluster& i_rCluster) const;
+	/// -1, and told once for each cluster, if the skeleton has none.
+	std::int64_t FindBone(FbxCluster& i_rCluster);
 
 	ImageCache m_Images;
 	std::string m_Path;
 	std::shared_ptr<VSkinSkeleton> m_pSkeleton;
 	std::unordered_map<std::string, std::int64_t> m_BoneOfName;
 	float m_UnitScale = 1.0f;
+	std::uint64_t m_BytesLeft = Limits::c_MeshBytes;
+	/// Nodes whose meshes' findings have been told.
+	std::set<const FbxNode*> m_Told;
+	/// Skins whose bones have been looked for, and clusters of which it was told that theirs is missing.
+	std::set<const FbxObject*> m_Searched;
 };
 
 } // namespace FBXIO

@@ -207,6 +207,7 @@ void FBXIO::FBXReader::VImpl::ForEachMesh(const std::function<void(FbxNode&)>& i
 
 void FBXIO::FBXReader::VImpl::ReadEachMesh(const std::function<void(FbxNode&)>& i_rRead)
 {
+	m_MeshReader.BeginMeshes();
 	std::vector<FbxNode*> meshes;
 	ForEachMesh([&meshes](FbxNode& i_rNode) { meshes.push_back(&i_rNode); });
 	for (std::size_t i = 0; i < meshes.size(); ++i)
@@ -300,6 +301,7 @@ void FBXIO::FBXReader::ReadPlacedMeshes(std::vector<VPlacedMesh>& o_rMeshes)
 
 void FBXIO::FBXReader::ReadTopMesh(VBasicMesh& o_rMesh)
 {
+	m_pImpl->m_MeshReader.BeginMeshes();
 	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadMesh(i_rNode, o_rMesh); }, true);
 }
 

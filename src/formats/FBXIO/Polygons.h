@@ -37,7 +37,7 @@ struct VEntryVertex
 
 /// Gives vertices their texture coordinates. Where these are given by polygon vertex the vertices become one for each
 /// coordinate; io_rIndices, the vertices of all polygons, follow.
-/// @param i_pName the node's, for messages: meshes of some exporters have none.
+/// @param i_pName the node's, for messages: meshes of some exporters have none. Null if nothing is to be told.
 template <typename TVertex>
 void ApplyTexCoords(
     FbxMesh& io_rFrom, const char* i_pName, std::vector<TVertex>& io_rVertices, std::vector<std::uint32_t>& io_rIndices)
@@ -59,7 +59,7 @@ void ApplyTexCoords(
 	};
 	const auto tellMissing = [&missing, i_pName]
 	{
-		if (missing > 0)
+		if (missing > 0 && i_pName)
 			NVX_LOG("FBXIO", NVX::ELogWarning, "%1% vertices of mesh %2% have no texture coordinate", missing, i_pName);
 	};
 	const int entries = rDirect.GetCount();
@@ -104,7 +104,7 @@ void ApplyTexCoords(
 		}
 	}
 	io_rVertices = std::move(vertices);
-	if (moved > 0)
+	if (moved > 0 && i_pName)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
 		    "%1% polygon vertices of mesh %2% are moved to other control points that share their texture coordinate",
 		    moved, i_pName);
@@ -117,8 +117,6 @@ void SplitIntoParts(FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndi
 {
 	const int count = io_rFrom.GetPolygonCount();
 	const bool bMaterial = io_rFrom.GetElementMaterialCount() > 0;
-	if (!bMaterial)
-		NVX_LOG("FBXIO", NVX::ELogWarning, "Missing material for mesh %1%", io_rFrom.GetName());
 	const FbxLayerElementArrayTemplate<int>* const pList =
 	    bMaterial ? &io_rFrom.GetElementMaterial()->GetIndexArray() : nullptr;
 	const bool bList = pList && pList->GetCount() == count;

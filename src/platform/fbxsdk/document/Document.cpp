@@ -56,7 +56,11 @@ void FbxFormat::VDocument::ReadObjects()
 			else if (value.m_Kind == EValueKind::Text)
 				m_ByName.emplace_back(value.m_Text, index);
 			else
+			{
+				// Before version 7 the global settings stand here.
+				m_Nameless += m_rTree.Name(element) == "GlobalSettings" ? 0 : 1;
 				continue;
+			}
 			m_Objects.push_back(
 			    {element, m_rTree.Name(element), SplitFullName(value.m_Text).m_Name, values.Next().m_Text});
 		}

@@ -65,6 +65,9 @@ public:
 	/// What of the document is missing, empty if nothing is.
 	const std::string& Error() const { return m_Error; }
 
+	/// How many objects were left out because nothing could name them.
+	std::size_t Nameless() const { return m_Nameless; }
+
 private:
 	void ReadObjects();
 	void ReadConnections();
@@ -73,6 +76,7 @@ private:
 	const VElementTree& m_rTree;
 	bool m_bEscapes = false;
 	std::string m_Error;
+	std::size_t m_Nameless = 0;
 	std::vector<VObject> m_Objects;
 	std::vector<VConnection> m_Connections;
 	std::vector<std::pair<std::int64_t, VObjectIndex>> m_ByNumber;

@@ -99,6 +99,9 @@ FbxFormat::VImportResult FbxFormat::VSceneBuilder::Build(
 	if (!io_rProgress.Tell(90.0f, "Building the scene"))
 		return result;
 	rContent.m_pDocument = std::make_unique<VDocument>(rContent.m_Tree);
+	if (rContent.m_pDocument->Nameless() > 0)
+		NVX_LOG("FBXIO", NVX::ELogWarning, "Objects left out because they have neither number nor name: %1%",
+		    rContent.m_pDocument->Nameless());
 	BuildSettings();
 	const bool bAll = BuildObjects(i_rKind.m_Version);
 	Connect();

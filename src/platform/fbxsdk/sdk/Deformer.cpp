@@ -57,8 +57,11 @@ double* fbxsdk::FbxCluster::GetControlPointWeights() const
 	return m_Weights.data();
 }
 
-fbxsdk::FbxAMatrix fbxsdk::FbxCluster::Matrix(const char* i_pName) const
+const fbxsdk::FbxAMatrix& fbxsdk::FbxCluster::Matrix(
+    std::unique_ptr<FbxAMatrix>& io_rpMatrix, const char* i_pName) const
 {
+	if (io_rpMatrix)
+		return *io_rpMatrix;
 	FbxAMatrix matrix;
 	std::vector<double> entries;
 	FbxFormat::Decode({m_Record.Child(i_pName), GetName(), &entries});
@@ -66,16 +69,17 @@ fbxsdk::FbxAMatrix fbxsdk::FbxCluster::Matrix(const char* i_pName) const
 		for (int i = 0; i < 16; ++i)
 			if (i % 4 != 3)
 				matrix[i / 4][i % 4] = entries[i];
-	return matrix;
+	io_rpMatrix = std::make_unique<FbxAMatrix>(matrix);
+	return *io_rpMatrix;
 }
 
 fbxsdk::FbxAMatrix& fbxsdk::FbxCluster::GetTransformMatrix(FbxAMatrix& pMatrix) const
 {
 	// Files hold it relative to the bone.
-	return pMatrix = Matrix("TransformLink") * Matrix("Transform");
+	return pMatrix = Matrix(m_pLinkMatrix, "TransformLink") * Matrix(m_pMatrix, "Transform");
 }
 
 fbxsdk::FbxAMatrix& fbxsdk::FbxCluster::GetTransformLinkMatrix(FbxAMatrix& pMatrix) const
 {
-	return pMatrix = Matrix("TransformLink");
+	return pMatrix = Matrix(m_pLinkMatrix, "TransformLink");
 }

@@ -4,6 +4,8 @@
 #include "fbxsdk/sdk/AffineMatrix.h"
 #include "fbxsdk/sdk/Object.h"
 
+#include <memory>
+
 namespace FbxFormat
 {
 class VSceneBuilder;
@@ -56,7 +58,8 @@ private:
 	void Load() const;
 	void AddJobs(std::vector<FbxFormat::VDecodeJob>& io_rJobs) const;
 	void EndJobs() const;
-	FbxAMatrix Matrix(const char* i_pName) const;
+	/// Reads it once: many meshes may share a skin.
+	const FbxAMatrix& Matrix(std::unique_ptr<FbxAMatrix>& io_rpMatrix, const char* i_pName) const;
 
 	FbxFormat::VArraySource m_Record;
 	FbxNode* m_pLink = nullptr;
@@ -65,6 +68,8 @@ private:
 	mutable bool m_bLoaded = false;
 	mutable std::vector<int> m_Indices;
 	mutable std::vector<double> m_Weights;
+	mutable std::unique_ptr<FbxAMatrix> m_pMatrix;
+	mutable std::unique_ptr<FbxAMatrix> m_pLinkMatrix;
 };
 
 class FbxSkin : public FbxDeformer
