@@ -62,6 +62,8 @@ testing::AssertionResult Matches(const QImage& i_rDrawn, const std::string& i_rN
 		return drawn.save(file) ? testing::AssertionSuccess()
 		                        : testing::AssertionFailure() << "cannot write " << file.toStdString();
 	const QImage stored = QImage(file).convertToFormat(QImage::Format_RGB32);
+	if (drawn == stored)
+		return testing::AssertionSuccess();
 	testing::AssertionResult failure = testing::AssertionFailure() << i_rName << ": ";
 	if (stored.isNull())
 		return failure << "cannot read " << file.toStdString();
