@@ -365,6 +365,23 @@ TEST_P(Pictures, PicksFindWhatIsSeen)
 		ASSERT_EQ(pick.m_Items.size(), 1u) << rRow.m_Item.m_Kind << " " << rRow.m_Item.m_ElementIndex;
 		EXPECT_EQ(pick.m_Items[0], rRow.m_Item) << pick.m_Items[0].m_Kind << " " << pick.m_Items[0].m_ElementIndex;
 	}
+
+	// What is there to be looked at alone is in no rectangle: the plates are.
+	Options().m_SolvingSubject = Only([](VSubjectOptions& o_rOptions)
+	    { o_rOptions.m_bAxes = o_rOptions.m_bTargetCovariances = o_rOptions.m_bMissingMarkers = true; });
+	const CoreOrlexTypes::VReconstructionLabelSet labels{{{TestSubject::c_Id, 0, {0, 320, 130}}}};
+	ShowSmall(VFlowSubjectForSolvingTypes::c_Types, &labels);
+	Draw(c_Small);
+	OrlexGraphics::VPickRequest all;
+	all.m_bRectangle = true;
+	all.m_Mouse = QPoint(319, 239);
+	OrlexGraphics::VPick pick;
+	m_Renderer.Pick(all, pick);
+	const auto isPicked = [&](const NVX::ISelectionItem& i_rItem)
+	{ return std::find(pick.m_Items.begin(), pick.m_Items.end(), i_rItem) != pick.m_Items.end(); };
+	EXPECT_EQ(pick.m_Items.size(), 2u);
+	EXPECT_TRUE(isPicked(items.Subject(TestSubject::c_Id)));
+	EXPECT_TRUE(isPicked(items.Segment(TestSubject::c_Id, TestSubject::ELimb)));
 }
 
 } // namespace

@@ -104,6 +104,26 @@ TEST_P(StagePictures, OfTheFloor)
 	}
 }
 
+TEST_P(StagePictures, HaveTheUpAxisOfTheLastFrameThatHasOne)
+{
+	using Flow2TypesUtils::FlowUpAxisItem;
+	const struct
+	{
+		std::optional<std::uint32_t> m_Axis;
+		bool m_bYUp;
+	} c_Rows[] = {{{}, false}, {1, true}, {{}, true}, {2, false}, {1, true}, {0, false}};
+	for (const auto& rRow : c_Rows)
+	{
+		m_Items.clear();
+		if (rRow.m_Axis)
+			Show(FlowUpAxisItem::c_pName, FlowUpAxisItem{*rRow.m_Axis});
+		else
+			m_pScene->SetFrame(MakeFrame({}));
+		Draw(c_Above);
+		EXPECT_EQ(m_pScene->FrameYUp(), rRow.m_bYUp) << &rRow - c_Rows;
+	}
+}
+
 TEST_P(StagePictures, OfVolumes)
 {
 	auto pSet = std::make_shared<Flow2Utils::VParameterSet>();

@@ -294,6 +294,15 @@ TEST_F(VViewTest, GivesUpARectangleWithTheFocus)
 	Release({100, 100}, Qt::AltModifier);
 	EXPECT_EQ(m_pView->MouseState(), OrlexGraphics::EMouseIdle);
 	EXPECT_TRUE(Selected().empty());
+
+	// One that is to be committed outlives the mouse's leaving, not the loss of the focus.
+	Press({10, 10}, Qt::AltModifier);
+	Drag({100, 100}, Qt::AltModifier);
+	Release({100, 100}, Qt::AltModifier);
+	Leave();
+	EXPECT_EQ(m_pView->MouseState(), OrlexGraphics::EMouseDragged);
+	m_pView->setFocus(false);
+	EXPECT_EQ(m_pView->MouseState(), OrlexGraphics::EMouseIdle);
 }
 
 } // namespace

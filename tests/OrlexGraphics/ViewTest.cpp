@@ -73,6 +73,14 @@ TEST(SceneFramebufferObject, IsWhatQmlKnowsItAs)
 		item.setProperty("cameraType", type);
 		EXPECT_EQ(item.property("cameraType"), 6) << type;
 	}
+	// However often its keys are pressed.
+	for (const auto& [factor, limit] : {std::pair(1.35, 15.0f), {0.7407407, 0.2f}, {std::nan(""), 0.2f}})
+	{
+		for (int i = 0; i < 40; ++i)
+			item.ScaleManipulator(factor);
+		EXPECT_EQ(item.Options().m_ManipulatorScale, limit);
+		EXPECT_EQ(item.GetSceneOptions()->value("ManipulatorScale").toFloat(), limit);
+	}
 	EXPECT_EQ(item.acceptedMouseButtons(), Qt::AllButtons);
 	EXPECT_TRUE(item.acceptHoverEvents());
 	EXPECT_TRUE(item.mirrorVertically());
@@ -174,6 +182,40 @@ TEST_F(VViewTest, OutlinesWhatIsSelectedAndWhatTheMousePointsAt)
 		Hover({190, 150});
 		EXPECT_TRUE(Until([&] { return Preselected().empty(); }));
 	}
+}
+
+TEST_F(VViewTest, TakesOtherSamplesWithTheNextFramebuffer)
+{
+	// An edge in the middle of a column of pixels.
+	m_pScene->m_Next.m_Boxes = {{Item(1), QRectF(20.5, 20, 40, 40)}};
+	Show();
+	const auto set = [&](const char* i_pKey, bool i_bValue)
+	{
+		m_pView->GetSceneOptions()->insert(i_pKey, i_bValue);
+		m_pView->OnSceneOptionsMapChanged(i_pKey, i_bValue);
+		Grab();
+	};
+	const auto isSmooth = [&]
+	{
+		const int edge = qBlue(Pixel(20, 40));
+		return edge > 0x40 && edge < 0xe0;
+	};
+	ASSERT_TRUE(Until([&] { return Pixel(40, 40) == 0xff0000ff; }));
+	EXPECT_TRUE(isSmooth());
+	// Nobody asks for another framebuffer while there is no 3D.
+	set("CameraView", true);
+	set("3D", false);
+	set("Distort3D", true);
+	set("Distort3D", false);
+	set("3D", true);
+	set("CameraView", false);
+	EXPECT_TRUE(isSmooth());
+	set("CameraView", true);
+	set("Distort3D", true);
+	set("CameraView", false);
+	EXPECT_FALSE(isSmooth()) << "the one of the camera view";
+	set("Distort3D", false);
+	EXPECT_TRUE(isSmooth());
 }
 
 TEST_F(VViewTest, FollowsTheUpAxisOfFrameAndOperator)
