@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 
 using namespace FBXIO;
@@ -232,6 +233,49 @@ TEST_P(Reader, TransformsThatAreNotFiniteBecomeTheIdentity)
 	EXPECT_EQ(rBones[1].m_Local(0, 3), 50.0f);
 	EXPECT_TRUE(rBones[2].m_PreRotation.isIdentity());
 	EXPECT_TRUE(rBones[3].m_Global.isIdentity());
+}
+
+TEST_P(Reader, MemoryIsReadLikeAFile)
+{
+	const std::string bytes = Write(GetParam(), Bones({{"hips", "LimbNode", -1, {}}}, {{"UpAxis", {2}}}));
+	FBXReader reader;
+	ASSERT_TRUE(reader.LoadMemory(bytes, "hero.fbx"));
+	EXPECT_TRUE(reader.IsComplete());
+	EXPECT_EQ(reader.GetUpAxis(), 2);
+	EXPECT_EQ(reader.GetSkeleton()->front().m_Name, "hips");
+	VTestLog log;
+	FBXReader other;
+	EXPECT_FALSE(other.LoadMemory("just some text", "hero.fbx"));
+	EXPECT_EQ(log.m_Messages.back().second, "Error returned: File is not an FBX file");
+}
+
+TEST_P(Reader, ProgressRisesAndCanEndTheImport)
+{
+	const VTestFile file(Write(GetParam(), Bones({{"hips", "LimbNode", -1, {}}})));
+	std::vector<float> told;
+	// The call that ends it; the last time none does.
+	for (std::size_t end = 0;; ++end)
+	{
+		told.clear();
+		VTestLog log;
+		FBXReader reader;
+		reader.SetProgress(
+		    [&](float i_Part)
+		    {
+			    told.push_back(i_Part);
+			    return told.size() != end + 1;
+		    });
+		EXPECT_TRUE(reader.LoadFile(file.Path()));
+		const bool bEnded = told.size() == end + 1;
+		EXPECT_EQ(reader.IsComplete(), !bEnded);
+		EXPECT_EQ(reader.HasSkeleton(), !bEnded);
+		EXPECT_EQ(log.m_Messages.back().second == "Error returned: Import was cancelled", bEnded);
+		if (!bEnded)
+			break;
+	}
+	EXPECT_GE(told.size(), 3u);
+	EXPECT_TRUE(std::is_sorted(told.begin(), told.end()));
+	EXPECT_EQ(told.back(), 1.0f);
 }
 
 TEST(Reader, NamesAreUtf8)

@@ -41,13 +41,13 @@ protected:
 		ASSERT_TRUE(QImage(i_Width, 1, QImage::Format_RGB32).save(QString::fromStdString(Path(i_rName)), "PNG"));
 	}
 
-	/// The parts of a triangle with these materials.
-	std::vector<VMeshPart> Read(const std::vector<VTestMaterial>& i_rMaterials)
+	/// The parts of two triangles with these materials.
+	std::vector<VMeshPart> Read(const std::vector<VTestMaterial>& i_rMaterials,
+	    const VTestLayer& i_rLayer = {"AllSame", "IndexToDirect", {}, {0}}, const VTestLayer& i_rTextures = {})
 	{
 		const VTestScene scene{{{"body", "Mesh", -1, {}}}, {}, {}, {}};
 		std::ofstream(Path("hero.fbx"), std::ios::binary) << Write(GetParam(), scene,
-		    {{0, {0, 0, 0, 1, 0, 0, 0, 1, 0}, {0, 1, -3}, {}, {}, {"AllSame", "IndexToDirect", {}, {0}}, i_rMaterials,
-		        {}}});
+		    {{0, {0, 0, 0, 1, 0, 0, 0, 1, 0}, {0, 1, -3, 0, 2, -2}, {}, {}, i_rLayer, i_rMaterials, {}, i_rTextures}});
 		FBXReader reader;
 		EXPECT_TRUE(reader.LoadFile(Path("hero.fbx")));
 		VBasicMesh mesh;
@@ -126,6 +126,71 @@ TEST_P(Material, TexturesAreLookedForInTurn)
 		if (!m_Failed.empty())
 			m_Failed.resize(1);
 		EXPECT_EQ(m_Failed, failed);
+	}
+}
+
+TEST_P(Material, PicturesInTheFileComeFirst)
+{
+	WritePicture("skin.png", 3);
+	WritePicture("other.png", 5);
+	std::ifstream other(Path("other.png"), std::ios::binary);
+	const std::string picture{std::istreambuf_iterator<char>(other), {}};
+	const std::vector<VMeshPart> parts = Read({{"lambert", {}, "C:\\art\\skin.png", "", picture}});
+	ASSERT_EQ(parts.size(), 1u);
+	ASSERT_NE(parts[0].m_pTexture, nullptr);
+	EXPECT_EQ(parts[0].m_pTexture->width(), 5);
+	EXPECT_EQ(parts[0].m_TexturePath, "C:\\art\\skin.png");
+	EXPECT_TRUE(m_Failed.empty());
+	// One that is no picture: that beside the file.
+	const std::vector<VMeshPart> broken = Read({{"lambert", {}, "skin.png", "", "no picture"}});
+	ASSERT_NE(broken.at(0).m_pTexture, nullptr);
+	EXPECT_EQ(broken[0].m_pTexture->width(), 3);
+	EXPECT_EQ(m_Failed, (std::vector<std::string>{"Failed to load skin.png (embedded)"}));
+}
+
+/// A head that promises more than a picture may have.
+TEST_P(Material, PicturesAreBounded)
+{
+	std::ofstream(Path("huge.ppm"), std::ios::binary) << "P6 20000 20000 255\n";
+	EXPECT_EQ(Read({{"lambert", {}, Path("huge.ppm"), ""}}).at(0).m_pTexture, nullptr);
+	EXPECT_EQ(m_Failed, (std::vector<std::string>{"Failed to load " + Path("huge.ppm")}));
+}
+
+TEST_P(Material, TexturesOfLayersGoToTheMaterialsOfTheirPolygons)
+{
+	if (GetParam().m_Version >= 7000)
+		return;
+	WritePicture("a.png", 1);
+	WritePicture("b.png", 2);
+	const std::string several =
+	    "Polygons of one material of body have several textures; each material gets the first of its own";
+	const struct
+	{
+		const char* m_pName;
+		VTestLayer m_Materials;
+		VTestLayer m_Textures;
+		/// Of the two parts, 0 for none.
+		int m_Widths[2];
+		std::string m_Message;
+	} rows[]{{"no layer", {"ByPolygon", "IndexToDirect", {}, {0, 1}}, {}, {1, 1}, {}},
+	    {"by polygon", {"ByPolygon", "IndexToDirect", {}, {0, 1}}, {"ByPolygon", "IndexToDirect", {}, {1, 0}}, {2, 1},
+	        {}},
+	    {"all the same", {"ByPolygon", "IndexToDirect", {}, {0, 1}}, {"AllSame", "IndexToDirect", {}, {1}}, {2, 2}, {}},
+	    {"none", {"ByPolygon", "IndexToDirect", {}, {1, 0}}, {"ByPolygon", "IndexToDirect", {}, {-1, 1}}, {2, 0}, {}},
+	    {"beyond", {"ByPolygon", "IndexToDirect", {}, {1, 0}}, {"ByPolygon", "IndexToDirect", {}, {9, 1}}, {2, 0}, {}},
+	    {"several", {"AllSame", "IndexToDirect", {}, {1}}, {"ByPolygon", "IndexToDirect", {}, {1, 0}}, {0, 2},
+	        several}};
+	for (const auto& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		VTestLog log;
+		const std::vector<VMeshPart> parts = Read(
+		    {{"lambert", {}, Path("a.png"), ""}, {"phong", {}, Path("b.png"), ""}}, rRow.m_Materials, rRow.m_Textures);
+		ASSERT_EQ(parts.size(), 2u);
+		for (int i = 0; i < 2; ++i)
+			EXPECT_EQ(parts[i].m_pTexture ? parts[i].m_pTexture->width() : 0, rRow.m_Widths[i]) << i;
+		ASSERT_EQ(log.m_Messages.size(), rRow.m_Message.empty() ? 1u : 2u);
+		EXPECT_TRUE(rRow.m_Message.empty() || log.m_Messages[1].second == rRow.m_Message);
 	}
 }
 

@@ -1,5 +1,7 @@
 #include "MeshFile.h"
 
+#include <QByteArray>
+
 #include <algorithm>
 
 using namespace FbxTest;
@@ -110,7 +112,7 @@ VTestRecord Properties(bool i_bNew, const std::vector<std::pair<std::string, VNu
 	return list;
 }
 
-void AddMaterials(VObjects& io_rObjects, const VTestMesh& i_rMesh)
+void AddMaterials(const VTestForm& i_rForm, VObjects& io_rObjects, const VTestMesh& i_rMesh)
 {
 	for (std::size_t i = 0; i < i_rMesh.m_Materials.size(); ++i)
 	{
@@ -124,6 +126,16 @@ void AddMaterials(VObjects& io_rObjects, const VTestMesh& i_rMesh)
 			continue;
 		const VTestValue texture = io_rObjects.Add("Texture", "texture" + name, "TextureVideoClip",
 		    {Record("FileName", {rMaterial.m_FileName}), Record("RelativeFilename", {rMaterial.m_RelativeName})});
+		if (!rMaterial.m_Content.empty())
+		{
+			// As text in two pieces.
+			const QByteArray text = QByteArray::fromStdString(rMaterial.m_Content).toBase64();
+			VTestRecord content = Record("Content",
+			    {VRaw{i_rForm.m_Form == EForm::Binary
+			            ? Bytes('R', std::uint32_t(rMaterial.m_Content.size()), rMaterial.m_Content)
+			            : '"' + text.left(8).toStdString() + "\",\n\"" + text.mid(8).toStdString() + '"'}});
+			io_rObjects.Connect(io_rObjects.Add("Video", "video" + name, "Clip", {std::move(content)}), texture);
+		}
 		if (io_rObjects.IsNew())
 			io_rObjects.Connect(texture, key, "DiffuseColor");
 		else
@@ -146,6 +158,7 @@ std::vector<VTestRecord> FbxTest::Records(
 		AddLayer(geometry, "LayerElementNormal", "Normals", "NormalsIndex", rMesh.m_Normals);
 		AddLayer(geometry, "LayerElementUV", "UV", "UVIndex", rMesh.m_UV);
 		AddLayer(geometry, "LayerElementMaterial", "", "Materials", rMesh.m_MaterialLayer);
+		AddLayer(geometry, "LayerElementTexture", "", "TextureId", rMesh.m_TextureLayer);
 		VTestRecord layer = Record("Layer", {std::int32_t(0)});
 		for (std::size_t i = 2; i < geometry.size(); ++i)
 		{
@@ -165,7 +178,7 @@ std::vector<VTestRecord> FbxTest::Records(
 			auto& rChildren = objects.Node(rMesh.m_Node).m_Children;
 			rChildren.insert(rChildren.end(), geometry.begin(), geometry.end());
 		}
-		AddMaterials(objects, rMesh);
+		AddMaterials(i_rForm, objects, rMesh);
 		if (rMesh.m_Clusters.empty())
 			continue;
 		const VTestValue skin =

@@ -22,6 +22,8 @@ struct VTestMaterial
 	/// File name and relative file name of a texture; none if both are empty.
 	std::string m_FileName;
 	std::string m_RelativeName;
+	/// Of the picture, which stands in the file.
+	std::string m_Content{};
 };
 
 struct VTestCluster
@@ -51,6 +53,8 @@ struct VTestMesh
 	std::vector<VTestMaterial> m_Materials;
 	/// A skin if there are any.
 	std::vector<VTestCluster> m_Clusters;
+	/// Before version 7: its index holds a texture for each polygon.
+	VTestLayer m_TextureLayer{};
 };
 
 /// The records of the scene with its meshes as that version has them.

@@ -188,6 +188,25 @@ TEST_P(Skin, ClustersOfUnevenListsKeepThePairs)
 	EXPECT_EQ(skin.m_Meshes.at(0).m_Vertices[1].m_BoneWeights, (VBytes{255, 0, 0, 0}));
 }
 
+TEST_P(Skin, WhatIsFoundOfAMeshIsToldOnce)
+{
+	const VTestScene scene{{{"root", "LimbNode", -1, {}}, {"body", "Mesh", -1, {}}}, {}, {}, {}};
+	VTestMesh mesh = Triangle(1, {{0, {0, 1, 2}, {1, 1, 1}, {}, {}}});
+	mesh.m_MaterialLayer = {};
+	mesh.m_Points[4] = std::nan("");
+	mesh.m_UV = {"ByPolygonVertex", "IndexToDirect", {0, 0, 1, 0}, {0, 0, 7}};
+	const VTestFile file(Write(GetParam(), scene, {mesh}));
+	FBXReader reader;
+	ASSERT_TRUE(reader.LoadFile(file.Path()));
+	std::vector<VPlacedMesh> placed;
+	reader.ReadPlacedMeshes(placed);
+	EXPECT_EQ(m_Log.m_Messages.size(), 5u) << "the load, a number, a moved and an unmapped vertex, no material";
+	VSkin skin;
+	reader.ReadSkin(skin);
+	EXPECT_EQ(skin.m_Meshes.size(), 1u);
+	EXPECT_EQ(m_Log.m_Messages.size(), 5u);
+}
+
 TEST_P(Skin, MeshesWithoutSkinAreNoPartOfIt)
 {
 	const VTestScene scene{{{"root", "LimbNode", -1, {}}, {"body", "Mesh", -1, {}}}, {}, {}, {}};

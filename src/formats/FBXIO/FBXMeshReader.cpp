@@ -27,6 +27,16 @@ QVector4D ColourAndFactor(const FbxPropertyT<FbxDouble3>& i_rColour, const FbxPr
 	return {Finite(colour[0]), Finite(colour[1]), Finite(colour[2]), Finite(i_rFactor.Get())};
 }
 
+/// The picture that the file holds of a texture. The SDK writes such pictures beside the file when it imports.
+template <typename TTexture>
+std::string ContentOf(const TTexture& i_rTexture)
+{
+	if constexpr (requires { i_rTexture.GetEmbeddedContent(); })
+		return i_rTexture.GetEmbeddedContent();
+	else
+		return {};
+}
+
 FbxSkin* FindSkin(FbxNode& i_rNode)
 {
 	FbxGeometry* const pGeometry = FBXMeshReader::IsMesh(i_rNode) ? i_rNode.GetGeometry() : nullptr;
@@ -141,7 +151,13 @@ void FBXIO::FBXMeshReader::ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPa
 	io_rPart.m_Transparent = ColourAndFactor(pLambert->TransparentColor, pLambert->TransparencyFactor);
 	if (pLambert->Diffuse.GetSrcObjectCount<FbxFileTexture>() == 0)
 		return;
-	io_rPart.m_TexturePath = FindTexture(*pLambert->Diffuse.GetSrcObject<FbxFileTexture>(0));
+	const FbxFileTexture& rTexture = *pLambert->Diffuse.GetSrcObject<FbxFileTexture>(0);
+	io_rPart.m_TexturePath = rTexture.GetFileName();
+	io_rPart.m_pTexture =
+	    m_Images.Get(io_rPart.m_TexturePath + " (embedded)", [&rTexture] { return ContentOf(rTexture); });
+	if (io_rPart.m_pTexture)
+		return;
+	io_rPart.m_TexturePath = FindTexture(rTexture);
 	io_rPart.m_pTexture = m_Images.Get(io_rPart.m_TexturePath);
 }
 

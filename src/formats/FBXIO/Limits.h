@@ -13,4 +13,7 @@ inline constexpr std::uint64_t c_MeshBytes = 256'000'000;
 /// What binding a mesh to a cluster counts as, for the time that it takes.
 inline constexpr std::uint64_t c_ClusterBytes = 512;
 
+/// A picture, and the file that an FBX file holds of one: 8,192 by 8,192 points.
+inline constexpr std::uint64_t c_ImageBytes = std::uint64_t(256) << 20;
+
 } // namespace FBXIO::Limits

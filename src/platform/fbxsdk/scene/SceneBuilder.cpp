@@ -4,6 +4,7 @@
 #include "fbxsdk/Limits.h"
 #include "fbxsdk/container/Values.h"
 #include "fbxsdk/document/Properties.h"
+#include "fbxsdk/scene/LegacyTextures.h"
 #include "fbxsdk/scene/MaterialReader.h"
 #include "fbxsdk/sdk/Mesh.h"
 #include "fbxsdk/sdk/NodeData.h"
@@ -177,6 +178,8 @@ FbxFormat::VSceneBuilder::VBuilt FbxFormat::VSceneBuilder::BuildPart(
 		return AddPart(i_rMaterials.ReadMaterial(i_rObject).release());
 	else if (i_rObject.m_Kind == "Texture")
 		return AddPart(i_rMaterials.ReadTexture(i_rObject).release());
+	else if (i_rObject.m_Kind == "Video")
+		return AddPart(new fbxsdk::FbxVideo(name(), record.Child("Content")));
 	return {};
 }
 
@@ -240,9 +243,14 @@ void FbxFormat::VSceneBuilder::Connect()
 		    && seen.emplace(rConnection.m_Child, rConnection.m_Parent, rConnection.m_Property).second)
 			ConnectParts(rChild, rParent, rConnection.m_Property);
 	}
-	for (const VTextureOfNode& rTexture : m_TexturesOfNodes)
-		for (fbxsdk::FbxSurfaceMaterial* const pMaterial : rTexture.m_pNode->m_pData->m_Materials)
-			VMaterialReader::Connect(*rTexture.m_pTexture, *pMaterial, "DiffuseColor");
+	// In the order of the file: nodes may share materials.
+	for (const auto& pNode : rContent.m_Nodes)
+		if (const auto found = m_TexturesOfNodes.find(pNode.get()); found != m_TexturesOfNodes.end())
+		{
+			const fbxsdk::FbxNode::VData& rData = *pNode->m_pData;
+			ConnectLegacyTextures(rData.m_pMesh ? rData.m_pMesh->m_Record : VArraySource(), pNode->GetName(),
+			    found->second, rData.m_Materials);
+		}
 	if (m_SecondParents > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
 		    "Connections left out because their node has another parent: %1%, such as that of %2%", m_SecondParents,
@@ -277,6 +285,7 @@ void FbxFormat::VSceneBuilder::ConnectParts(
 	constexpr FbxCluster* c_pCluster = nullptr;
 	constexpr FbxSurfaceMaterial* c_pMaterial = nullptr;
 	constexpr FbxFileTexture* c_pTexture = nullptr;
+	constexpr FbxVideo* c_pVideo = nullptr;
 	if (!i_Property.empty())
 	{
 		if (child(c_pTexture) && parent(c_pMaterial))
@@ -295,8 +304,10 @@ void FbxFormat::VSceneBuilder::ConnectParts(
 		else if (FbxSkin* const pSkin = child(c_pSkin); pSkin && rData.m_pMesh)
 			rData.m_pMesh->m_Skins.push_back(pSkin);
 		else if (FbxFileTexture* const pTexture = child(c_pTexture))
-			m_TexturesOfNodes.push_back({pTexture, pNode});
+			m_TexturesOfNodes[pNode].push_back(pTexture);
 	}
+	else if (child(c_pVideo) && parent(c_pTexture))
+		parent(c_pTexture)->m_pVideo = child(c_pVideo);
 	else if (child(c_pSkin) && parent(c_pMesh))
 		parent(c_pMesh)->m_Skins.push_back(child(c_pSkin));
 	else if (child(c_pCluster) && parent(c_pSkin))

@@ -3,6 +3,7 @@
 #include "fbxsdk/container/FileBytes.h"
 #include "fbxsdk/container/FileKind.h"
 
+#include <map>
 #include <string>
 #include <variant>
 #include <vector>
@@ -17,6 +18,7 @@ class FbxScene;
 class FbxSkeleton;
 class FbxSkin;
 class FbxSurfaceMaterial;
+class FbxVideo;
 } // namespace fbxsdk
 
 namespace FbxFormat
@@ -54,12 +56,7 @@ private:
 
 	/// What was made of an object.
 	using VBuilt = std::variant<std::monostate, fbxsdk::FbxNode*, fbxsdk::FbxSkeleton*, fbxsdk::FbxMesh*,
-	    fbxsdk::FbxSkin*, fbxsdk::FbxCluster*, fbxsdk::FbxSurfaceMaterial*, fbxsdk::FbxFileTexture*>;
-	struct VTextureOfNode
-	{
-		fbxsdk::FbxFileTexture* m_pTexture;
-		fbxsdk::FbxNode* m_pNode;
-	};
+	    fbxsdk::FbxSkin*, fbxsdk::FbxCluster*, fbxsdk::FbxSurfaceMaterial*, fbxsdk::FbxFileTexture*, fbxsdk::FbxVideo*>;
 
 	/// Keeps the part and gives it back.
 	template <typename T>
@@ -71,7 +68,7 @@ private:
 	/// By object.
 	std::vector<VBuilt> m_Built;
 	/// Before version 7 textures are connected to nodes, whose materials may follow.
-	std::vector<VTextureOfNode> m_TexturesOfNodes;
+	std::map<const fbxsdk::FbxNode*, std::vector<fbxsdk::FbxFileTexture*>> m_TexturesOfNodes;
 	const fbxsdk::FbxNode* m_pSecondParent = nullptr;
 	std::size_t m_SecondParents = 0;
 };

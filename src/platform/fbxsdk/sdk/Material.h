@@ -1,7 +1,13 @@
 #pragma once
 
+#include "fbxsdk/scene/VideoContent.h"
 #include "fbxsdk/sdk/AffineMatrix.h"
 #include "fbxsdk/sdk/Property.h"
+
+namespace FbxFormat
+{
+class VSceneBuilder;
+}
 
 namespace fbxsdk
 {
@@ -46,6 +52,20 @@ private:
 	using FbxSurfaceLambert::FbxSurfaceLambert;
 };
 
+class FbxVideo : public FbxObject
+{
+private:
+	friend class FbxFileTexture;
+	friend class FbxFormat::VSceneBuilder;
+
+	FbxVideo(std::string i_Name, const FbxFormat::VArraySource& i_rContent)
+	    : FbxObject(std::move(i_Name)), m_Content(i_rContent)
+	{
+	}
+
+	FbxFormat::VArraySource m_Content;
+};
+
 class FbxFileTexture : public FbxObject
 {
 public:
@@ -53,8 +73,16 @@ public:
 	const char* GetFileName() const { return m_FileName.c_str(); }
 	const char* GetRelativeFileName() const { return m_RelativeFileName.c_str(); }
 
+	/// The file of the video that the texture shows, read anew at each call; empty if the FBX file does not hold it.
+	/// The SDK writes such a file beside the FBX file instead, and gives it as the file name.
+	std::string GetEmbeddedContent() const
+	{
+		return m_pVideo ? FbxFormat::ReadContent(m_pVideo->m_Content) : std::string();
+	}
+
 private:
 	friend class FbxFormat::VMaterialReader;
+	friend class FbxFormat::VSceneBuilder;
 
 	FbxFileTexture(std::string i_Name, std::string i_FileName, std::string i_RelativeFileName)
 	    : FbxObject(std::move(i_Name)), m_FileName(std::move(i_FileName)),
@@ -64,6 +92,7 @@ private:
 
 	std::string m_FileName;
 	std::string m_RelativeFileName;
+	const FbxVideo* m_pVideo = nullptr;
 };
 
 } // namespace fbxsdk

@@ -1,0 +1,69 @@
+#include "fbxsdk/scene/LegacyTextures.h"
+
+#include "DebugServices/GlobalLog.h"
+#include "fbxsdk/container/Values.h"
+#include "fbxsdk/scene/MaterialReader.h"
+
+#include <algorithm>
+
+namespace
+{
+
+using namespace FbxFormat;
+
+constexpr std::string_view c_Diffuse = "DiffuseColor";
+
+/// For each polygon a place in a list; a single one is that of all.
+std::vector<std::int32_t> PlacesOf(
+    const VArraySource& i_rMesh, const char* i_pLayer, const char* i_pPlaces, const char* i_pNode)
+{
+	const VArraySource layer = i_rMesh.m_Element == c_NoElement ? i_rMesh : i_rMesh.Child(i_pLayer);
+	if (layer.m_Element == c_NoElement)
+		return {};
+	std::vector<std::int32_t> places;
+	(void)Decode({layer.Child(i_pPlaces), i_pNode, &places});
+	const VElementIndex mapping = layer.Child("MappingInformationType").m_Element;
+	const std::string_view mode =
+	    mapping == c_NoElement ? std::string_view() : ValueAt(*i_rMesh.m_pTree, mapping, 0).m_Text;
+	if (mode == "AllSame")
+		places.resize(std::min<std::size_t>(places.size(), 1));
+	else if (mode != "ByPolygon")
+		places.clear();
+	return places;
+}
+
+} // namespace
+
+void FbxFormat::ConnectLegacyTextures(const VArraySource& i_rMesh, const char* i_pNode,
+    std::span<fbxsdk::FbxFileTexture* const> i_Textures, std::span<fbxsdk::FbxSurfaceMaterial* const> i_Materials)
+{
+	const std::vector<std::int32_t> textures = PlacesOf(i_rMesh, "LayerElementTexture", "TextureId", i_pNode);
+	if (textures.empty())
+	{
+		for (fbxsdk::FbxSurfaceMaterial* const pMaterial : i_Materials)
+			VMaterialReader::Connect(*i_Textures.front(), *pMaterial, c_Diffuse);
+		return;
+	}
+	const std::vector<std::int32_t> materials = PlacesOf(i_rMesh, "LayerElementMaterial", "Materials", i_pNode);
+	constexpr std::int32_t c_Unknown = -2;
+	std::vector<std::int32_t> textureOf(i_Materials.size(), c_Unknown);
+	bool bSeveral = false;
+	for (std::size_t polygon = 0; polygon < std::max(textures.size(), materials.size()); ++polygon)
+	{
+		// Materials below zero are the first, as everywhere.
+		const std::int32_t material = materials.empty() ? 0 : materials[std::min(polygon, materials.size() - 1)];
+		const auto place = std::size_t(std::max(material, 0));
+		const std::int32_t texture = textures[std::min(polygon, textures.size() - 1)];
+		if (place >= textureOf.size() || texture >= std::int32_t(i_Textures.size()))
+			continue;
+		bSeveral = bSeveral || (textureOf[place] != c_Unknown && textureOf[place] != texture);
+		if (textureOf[place] == c_Unknown)
+			textureOf[place] = texture;
+	}
+	for (std::size_t i = 0; i < textureOf.size(); ++i)
+		if (textureOf[i] >= 0)
+			VMaterialReader::Connect(*i_Textures[textureOf[i]], *i_Materials[i], c_Diffuse);
+	if (bSeveral)
+		NVX_LOG("FBXIO", NVX::ELogWarning,
+		    "Polygons of one material of %1% have several textures; each material gets the first of its own", i_pNode);
+}
