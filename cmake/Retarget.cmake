@@ -86,9 +86,14 @@ function(retarget_test name)
 	math(EXPR display "100 + 0x${hash} % 30000")
 	add_test(NAME ${name} COMMAND ${RETARGET_XVFB_RUN} -a -n ${display} -s "-screen 0 1920x1200x24"
 		$<TARGET_FILE:test_${name}>)
+	set(threads "")
+	if(RETARGET_SANITIZE MATCHES "thread")
+		# The driver draws without threads of its own, which ThreadSanitizer does not know to wait for each other.
+		set(threads "LP_NUM_THREADS=0;TSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/threads.supp")
+	endif()
 	# XCB copies texts that do not end in a zero, with their length: the strict checks take that for an overflow.
 	set_tests_properties(${name} PROPERTIES ENVIRONMENT
-		"QT_QPA_PLATFORM=xcb;LIBGL_ALWAYS_SOFTWARE=1;ASAN_OPTIONS=detect_leaks=1;LSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/display.supp:print_suppressions=0")
+		"QT_QPA_PLATFORM=xcb;LIBGL_ALWAYS_SOFTWARE=1;ASAN_OPTIONS=detect_leaks=1;LSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/display.supp:print_suppressions=0;${threads}")
 endfunction()
 
 # retarget_package(): the CMake package config of all that was installed, so that find_package(RetargetSetup) gives

@@ -3,10 +3,22 @@
 #include <cstdlib>
 #include <new>
 
+static thread_local std::size_t g_Allocations = 0;
+
+std::size_t AllocationCount()
+{
+	return g_Allocations;
+}
+
+#if defined(__has_feature)
+#if __has_feature(thread_sanitizer)
+#define COUNTS_NOTHING
+#endif
+#endif
+#ifndef COUNTS_NOTHING
+
 namespace
 {
-
-thread_local std::size_t g_Allocations = 0;
 
 void* Allocate(std::size_t i_Size)
 {
@@ -52,7 +64,4 @@ void operator delete[](void* i_pMemory, std::size_t) noexcept
 	std::free(i_pMemory);
 }
 
-std::size_t AllocationCount()
-{
-	return g_Allocations;
-}
+#endif

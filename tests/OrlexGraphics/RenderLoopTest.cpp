@@ -8,6 +8,8 @@ namespace
 /// Qt takes its render loop and its scale once for a process, so each of them is a process of its own.
 TEST(RenderLoops, ShowAndPickTheSame)
 {
+	if (qEnvironmentVariableIsSet("TSAN_OPTIONS"))
+		GTEST_SKIP() << "as windows in this process";
 	constexpr const char* c_pTests = "VViewTest.Selects*:VViewTest.Shows*:VViewTest.Ends*";
 	const struct
 	{

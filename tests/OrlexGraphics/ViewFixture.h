@@ -90,6 +90,12 @@ protected:
 	VViewTest();
 	~VViewTest() override;
 
+	void SetUp() override
+	{
+		if (qEnvironmentVariableIsSet("TSAN_OPTIONS"))
+			GTEST_SKIP() << "ThreadSanitizer does not see how Qt's threads wait for each other; HandOverTest is for it";
+	}
+
 	void Show();
 	void Show(const std::shared_ptr<OrlexGraphics::VOrlexScene>& i_rpScene);
 

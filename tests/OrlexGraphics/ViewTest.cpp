@@ -341,7 +341,7 @@ TEST_F(VViewTest, EndsItsRenderersWithTheirWindows)
 	const std::uint64_t living = VSceneFramebufferRenderer::LivingCount();
 	const std::uint64_t made = VSceneFramebufferRenderer::MadeCount();
 	const int cycles =
-	    qEnvironmentVariableIsSet("RETARGET_TEST_CYCLES") ? qEnvironmentVariableIntValue("RETARGET_TEST_CYCLES") : 10;
+	    qEnvironmentVariableIsSet("RETARGET_TEST_CYCLES") ? qEnvironmentVariableIntValue("RETARGET_TEST_CYCLES") : 6;
 	const auto isSelected = [&] { return Pixel(40, 40) == 0xff4040ff; };
 	// A dock is another window, with another context.
 	const auto dock = [&](auto& io_rView, auto& io_rDock)
