@@ -27,11 +27,11 @@ class Pictures : public VPicturesTest
 protected:
 	/// The small subject as one of a class.
 	void ShowSmall(const VSubjectTypes& i_rTypes = VFlowSubjectForSolvingTypes::c_Types,
-	    const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr)
+	    const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr,
+	    const CoreOrlexTypes::VSubjectDynamicParameters& i_rPose = TestSubject::MakePose())
 	{
 		std::vector items{Tagged(i_rTypes.m_Subject, TestSubject::Make()),
-		    Tagged(i_rTypes.m_ApplicationData, TestSubject::MakeData()),
-		    Tagged(i_rTypes.m_Pose, TestSubject::MakePose())};
+		    Tagged(i_rTypes.m_ApplicationData, TestSubject::MakeData()), Tagged(i_rTypes.m_Pose, i_rPose)};
 		if (i_pLabels)
 			items.push_back(Tagged(i_rTypes.m_Labels, *i_pLabels));
 		if (i_rTypes.m_Settings)
@@ -223,6 +223,19 @@ TEST_P(Pictures, OfSourceAndTargetFromEachSide)
 		for (std::uint32_t type = 0; type < (bES2 ? 1u : CoreGraphics::ECameraTypeCount); ++type)
 			Compare(Draw({middle, 3000.0f, -75.0f, 30.0f, type, 9.0f}),
 			    std::string(bYUp ? "y-up-" : "z-up-") + c_Names[type]);
+	}
+}
+
+TEST_P(Pictures, OfAPlateThatLiesOnTheFloor)
+{
+	ShowSmall(VFlowSubjectForSolvingTypes::c_Types, nullptr, {TestSubject::c_Id, {0, 0, 0.7}});
+	Options().m_bFloorGrid = true;
+	// Through a telescope: there a step of depth is twice as large as the plate's height over the floor.
+	Camera().m_FieldOfView = 1.3f;
+	for (const bool bTranslucent : {true, false})
+	{
+		Options().m_bFloorGridIsTranslucent = bTranslucent;
+		Compare(Draw({{0, 0, 0}, 7000.0f, -60.0f}), bTranslucent ? "plate-on-floor" : "plate-on-opaque-floor");
 	}
 }
 

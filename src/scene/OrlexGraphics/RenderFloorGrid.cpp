@@ -96,8 +96,12 @@ void VRenderFloorGrid::Render(VRenderContext& io_rContext, const VSceneOptions& 
 		return;
 	const VFloor floor = GetFloor(i_rOptions);
 	io_rContext.ApplyState(StateOf(bTranslucent));
+	// What lies on the floor is not to fight with it, nor its strips with its lines: from far away, depth tells no two
+	// places apart that are a plate's thickness from each other.
+	io_rContext.m_pFunctions->glEnable(GL_POLYGON_OFFSET_FILL);
 	RenderLines(io_rContext, floor);
 	RenderEdges(io_rContext, floor);
+	io_rContext.m_pFunctions->glDisable(GL_POLYGON_OFFSET_FILL);
 }
 
 void VRenderFloorGrid::RenderLines(VRenderContext& io_rContext, const VFloor& i_rFloor)
@@ -114,12 +118,9 @@ void VRenderFloorGrid::RenderLines(VRenderContext& io_rContext, const VFloor& i_
 	io_rContext.SetUniform(m_Texture, 0);
 	io_rContext.SetUniform(m_GridSpacings,
 	    QVector2D(i_rFloor.m_Spacing, i_rFloor.m_Spacing / static_cast<float>(std::max(i_rFloor.m_Divisions, 1u))));
-	// What lies in the floor is not to fight with it.
-	io_rContext.m_pFunctions->glEnable(GL_POLYGON_OFFSET_FILL);
-	io_rContext.m_pFunctions->glPolygonOffset(1.0f, 1.0f);
 	io_rContext.BindVertices(m_Square);
+	io_rContext.m_pFunctions->glPolygonOffset(2.0f, 4.0f);
 	DrawExtents(io_rContext, GL_TRIANGLE_FAN, ExtentsOf(i_rFloor));
-	io_rContext.m_pFunctions->glDisable(GL_POLYGON_OFFSET_FILL);
 }
 
 void VRenderFloorGrid::RenderEdges(VRenderContext& io_rContext, const VFloor& i_rFloor)
@@ -130,6 +131,7 @@ void VRenderFloorGrid::RenderEdges(VRenderContext& io_rContext, const VFloor& i_
 	io_rContext.SetUniform(m_Colour, c_EdgeColour);
 	io_rContext.BindVertices(m_Square);
 	DrawExtents(io_rContext, GL_LINE_LOOP, extents);
+	io_rContext.m_pFunctions->glPolygonOffset(1.0f, 2.0f);
 	DrawExtents(io_rContext, GL_TRIANGLE_FAN, QVector4D(extents.x(), -c_HalfStripWidth, extents.z(), c_HalfStripWidth));
 	DrawExtents(io_rContext, GL_TRIANGLE_FAN, QVector4D(-c_HalfStripWidth, extents.y(), c_HalfStripWidth, extents.w()));
 }
