@@ -42,6 +42,9 @@ public:
 	/// What stands on the screen around a place of the preview.
 	QImage See(const QPointF& i_rPlace, int i_Reach) const;
 
+	/// Until the panel has been laid out and drawn once more.
+	void WaitForDrawing() const;
+
 	/// The keyboard, where the focus is.
 	void Key(int i_Key, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
 	void Type(const QString& i_rText);
@@ -64,8 +67,6 @@ public:
 
 private:
 	QWidget* Dialog() const;
-	/// Until the panel has been laid out and drawn once more.
-	void WaitForDrawing() const;
 	QPoint InWindow(const QPointF& i_rPlace) const;
 	/// The dialog has closed, and the keyboard is the window's again.
 	bool ComeBack();
