@@ -12,6 +12,8 @@
 #include <QTemporaryDir>
 
 #include <algorithm>
+#include <regex>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -127,6 +129,31 @@ TEST_P(ShaderLibrary, LinksEveryPairOfTheCatalogue)
 	}
 	EXPECT_EQ(library.GetVertexShaderNames(), vertices);
 	EXPECT_EQ(library.GetFragmentShaderNames(), fragments);
+}
+
+TEST_P(ShaderLibrary, NoUniformIsInBothShadersOfAPair)
+{
+	// Their precisions differ in OpenGL ES, which some drivers refuse to link.
+	const auto uniforms = [](EShaderType i_Type, const char* i_pName)
+	{
+		const VShader shader(
+		    i_Type, std::string(i_Type == EShaderVertex ? ":/Vertex" : ":/Fragment") + "Shaders/" + i_pName + ".glsl");
+		const std::string text = shader.Get()->sourceCode().toStdString();
+		const std::regex declaration("\\nuniform \\w+ (\\w+)");
+		std::set<std::string> names;
+		for (std::sregex_iterator i(text.begin(), text.end(), declaration), end; i != end; ++i)
+			names.insert((*i)[1]);
+		return names;
+	};
+	VShaderLibrary library;
+	library.InitialiseGL();
+	EXPECT_EQ(uniforms(EShaderVertex, "Sphere").size(), 3u);
+	for (const VPair& rPair : c_Catalogue)
+	{
+		const std::set<std::string> fragment = uniforms(EShaderFragment, rPair.m_pFragment);
+		for (const std::string& rName : uniforms(EShaderVertex, rPair.m_pVertex))
+			EXPECT_FALSE(fragment.contains(rName)) << rPair.m_pVertex << ", " << rPair.m_pFragment << ": " << rName;
+	}
 }
 
 TEST_P(ShaderLibrary, ProgramsHaveTheUniformsThatTheirUsersSet)
