@@ -34,9 +34,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i
 	FbxFormat::VDecodeBudget budget{16'000'000};
 	for (FbxFormat::VElementIndex element = 0; element < tree.Size(); ++element)
 	{
-		std::vector<float> reals;
+		FbxFormat::VArrayNumbers<float> reals;
 		FbxFormat::ReadArray(tree, element, budget, reals);
-		std::vector<std::int32_t> integers;
+		FbxFormat::VArrayNumbers<std::int32_t> integers;
 		FbxFormat::ReadArray(tree, element, budget, integers);
 	}
 	return 0;

@@ -22,7 +22,7 @@ struct VArrayFile
 		m_Tree.Read(m_Bytes, DetectFileKind(m_Bytes));
 	}
 	template <typename T>
-	bool Read(std::vector<T>& o_rNumbers, std::uint64_t i_Budget = Limits::c_DecodedBytes) const
+	bool Read(VArrayNumbers<T>& o_rNumbers, std::uint64_t i_Budget = Limits::c_DecodedBytes) const
 	{
 		VDecodeBudget budget{i_Budget};
 		return ReadArray(m_Tree, m_Tree.Find(VElementTree::c_Root, "A"), budget, o_rNumbers);
@@ -44,10 +44,10 @@ TEST(Arrays, GiveTheSameNumbersFromEveryForm)
 	for (const VTestForm& rForm : c_Forms)
 	{
 		const VArrayFile file(rForm, numbers);
-		VNumbers reals;
+		VArrayNumbers<double> reals;
 		EXPECT_TRUE(file.Read(reals)) << rForm.m_pName;
-		EXPECT_EQ(reals, numbers) << rForm.m_pName;
-		std::vector<std::int32_t> integers;
+		EXPECT_EQ(VNumbers(reals.begin(), reals.end()), numbers) << rForm.m_pName;
+		VArrayNumbers<std::int32_t> integers;
 		EXPECT_TRUE(file.Read(integers)) << rForm.m_pName;
 		EXPECT_EQ(std::vector<double>(integers.begin(), integers.end()), numbers) << rForm.m_pName;
 	}
@@ -62,13 +62,13 @@ TEST(Arrays, ConvertEveryType)
 	    {plain('b', "\1\xff"s, 2), {1.0, -1.0}}, {plain('c', "\3", 1), {3.0}}, {plain('d', "", 0), {}}};
 	for (const auto& [value, expected] : rows)
 	{
-		VNumbers numbers;
+		VArrayNumbers<double> numbers;
 		EXPECT_TRUE(VArrayFile(c_Forms[2], value).Read(numbers)) << value.m_Bytes[0];
-		EXPECT_EQ(numbers, expected) << value.m_Bytes[0];
+		EXPECT_EQ(VNumbers(numbers.begin(), numbers.end()), expected) << value.m_Bytes[0];
 	}
-	std::vector<std::int32_t> integers;
+	VArrayNumbers<std::int32_t> integers;
 	EXPECT_TRUE(VArrayFile(c_Forms[4], VNumbers{1e300, -3.7, 2147483647.0}).Read(integers));
-	EXPECT_EQ(integers, (std::vector<std::int32_t>{0, -3, 2147483647}));
+	EXPECT_EQ(integers, (VArrayNumbers<std::int32_t>{0, -3, 2147483647}));
 }
 
 struct VDamageRow
@@ -93,7 +93,7 @@ TEST_P(DamagedArray, IsRefused)
 {
 	const VArrayFile file(c_Forms[1], GetParam().m_Value);
 	EXPECT_EQ(!file.m_Tree.Error().empty(), GetParam().m_bAtOnce);
-	VNumbers numbers{1.0};
+	VArrayNumbers<double> numbers{1.0};
 	// What was refused at once counts as a record without values.
 	EXPECT_EQ(file.Read(numbers, GetParam().m_Budget), GetParam().m_bAtOnce);
 	EXPECT_TRUE(numbers.empty());
@@ -124,7 +124,7 @@ TEST(Arrays, OfTextMustHoldTheirCount)
 		VElementTree tree;
 		ASSERT_TRUE(tree.Read(bytes, DetectFileKind(bytes)));
 		VDecodeBudget budget;
-		VNumbers numbers;
+		VArrayNumbers<double> numbers;
 		EXPECT_FALSE(ReadArray(tree, 1, budget, numbers)) << pText;
 	}
 }

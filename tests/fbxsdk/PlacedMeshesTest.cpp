@@ -54,7 +54,7 @@ std::map<std::string, VBounds> PlacedBounds(const std::string& i_rPath)
 		const VElementIndex vertices = tree.Find(i_rGeometry.m_Element, "Vertices");
 		if (vertices == c_NoElement)
 			return;
-		std::vector<double> points;
+		FbxFormat::VArrayNumbers<double> points;
 		EXPECT_TRUE(ReadArray(tree, vertices, budget, points));
 		const std::string name = document.Decoded(i_rModel.m_Name);
 		const FbxAMatrix& rGlobal = globals.at(name);

@@ -143,14 +143,17 @@ void SplitIntoParts(FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndi
 	forEachPolygon(
 	    [&](std::size_t i_Part, const std::uint32_t* i_pVertices, int i_Size)
 	    {
-		    std::uint8_t* pNext = next[i_Part];
-		    for (int i = 1; i + 1 < i_Size; ++i)
+		    std::uint8_t*& rpNext = next[i_Part];
+		    TIndex triangle[3]{TIndex(i_pVertices[0]), TIndex(i_pVertices[1]), TIndex(i_pVertices[2])};
+		    for (int i = 3;; ++i)
 		    {
-			    const TIndex triangle[3]{TIndex(i_pVertices[0]), TIndex(i_pVertices[i]), TIndex(i_pVertices[i + 1])};
-			    std::memcpy(pNext, triangle, sizeof(triangle));
-			    pNext += sizeof(triangle);
+			    std::memcpy(rpNext, triangle, sizeof(triangle));
+			    rpNext += sizeof(triangle);
+			    if (i == i_Size)
+				    break;
+			    triangle[1] = triangle[2];
+			    triangle[2] = TIndex(i_pVertices[i]);
 		    }
-		    next[i_Part] = pNext;
 	    });
 }
 

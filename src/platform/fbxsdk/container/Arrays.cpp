@@ -25,7 +25,7 @@ bool Decode(const Binary::VArray& i_rArray, void* o_pBytes, std::size_t i_Size)
 		return true;
 	}
 	using VDecompressor = std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)>;
-	const VDecompressor pDecompressor(libdeflate_alloc_decompressor(), &libdeflate_free_decompressor);
+	thread_local const VDecompressor pDecompressor(libdeflate_alloc_decompressor(), &libdeflate_free_decompressor);
 	return pDecompressor
 	    && libdeflate_zlib_decompress(
 	           pDecompressor.get(), i_rArray.m_pBytes, i_rArray.m_Size, o_pBytes, i_Size, nullptr)
@@ -46,7 +46,7 @@ T Convert(TFile i_Number)
 }
 
 template <typename TFile, typename T>
-bool DecodeAs(const Binary::VArray& i_rArray, std::vector<T>& o_rNumbers)
+bool DecodeAs(const Binary::VArray& i_rArray, VArrayNumbers<T>& o_rNumbers)
 {
 	if constexpr (std::is_same_v<TFile, T>)
 	{
@@ -55,7 +55,7 @@ bool DecodeAs(const Binary::VArray& i_rArray, std::vector<T>& o_rNumbers)
 	}
 	else
 	{
-		std::vector<TFile> numbers(i_rArray.m_Count);
+		VArrayNumbers<TFile> numbers(i_rArray.m_Count);
 		if (!Decode(i_rArray, numbers.data(), numbers.size() * sizeof(TFile)))
 			return false;
 		o_rNumbers.resize(numbers.size());
@@ -65,7 +65,7 @@ bool DecodeAs(const Binary::VArray& i_rArray, std::vector<T>& o_rNumbers)
 }
 
 template <typename T>
-bool DecodeBinary(const Binary::VArray& i_rArray, std::vector<T>& o_rNumbers)
+bool DecodeBinary(const Binary::VArray& i_rArray, VArrayNumbers<T>& o_rNumbers)
 {
 	if (i_rArray.m_Count == 0)
 		return true;
@@ -80,7 +80,7 @@ bool DecodeBinary(const Binary::VArray& i_rArray, std::vector<T>& o_rNumbers)
 }
 
 template <typename T>
-bool Append(const VValue& i_rValue, std::vector<T>& io_rNumbers)
+bool Append(const VValue& i_rValue, VArrayNumbers<T>& io_rNumbers)
 {
 	if (i_rValue.m_Kind == EValueKind::Integer)
 		io_rNumbers.push_back(Convert<T>(i_rValue.m_Integer));
@@ -92,7 +92,7 @@ bool Append(const VValue& i_rValue, std::vector<T>& io_rNumbers)
 }
 
 template <typename T>
-bool ParseText(std::string_view i_Text, std::uint32_t i_Count, std::vector<T>& o_rNumbers)
+bool ParseText(std::string_view i_Text, std::uint32_t i_Count, VArrayNumbers<T>& o_rNumbers)
 {
 	o_rNumbers.reserve(i_Count);
 	const char* const pEnd = i_Text.data() + i_Text.size();
@@ -109,7 +109,7 @@ bool ParseText(std::string_view i_Text, std::uint32_t i_Count, std::vector<T>& o
 }
 
 template <typename T>
-bool ReadList(const VElementTree& i_rTree, VElementIndex i_Element, std::vector<T>& o_rNumbers)
+bool ReadList(const VElementTree& i_rTree, VElementIndex i_Element, VArrayNumbers<T>& o_rNumbers)
 {
 	o_rNumbers.reserve(i_rTree[i_Element].m_ValueCount);
 	VValueCursor cursor(i_rTree, i_Element);
@@ -147,7 +147,7 @@ std::uint64_t FbxFormat::DecodedBytes(const VElementTree& i_rTree, VElementIndex
 }
 
 template <typename T>
-bool FbxFormat::ReadCharged(const VElementTree& i_rTree, VElementIndex i_Element, std::vector<T>& o_rNumbers)
+bool FbxFormat::ReadCharged(const VElementTree& i_rTree, VElementIndex i_Element, VArrayNumbers<T>& o_rNumbers)
 {
 	o_rNumbers.clear();
 	const VElement& rElement = i_rTree[i_Element];
@@ -163,7 +163,7 @@ bool FbxFormat::ReadCharged(const VElementTree& i_rTree, VElementIndex i_Element
 
 #define RETARGET_ARRAYS_OF(T)                                                                                          \
 	template std::uint64_t FbxFormat::DecodedBytes<T>(const VElementTree&, VElementIndex);                             \
-	template bool FbxFormat::ReadCharged(const VElementTree&, VElementIndex, std::vector<T>&);
+	template bool FbxFormat::ReadCharged(const VElementTree&, VElementIndex, VArrayNumbers<T>&);
 RETARGET_ARRAYS_OF(float)
 RETARGET_ARRAYS_OF(double)
 RETARGET_ARRAYS_OF(std::int32_t)

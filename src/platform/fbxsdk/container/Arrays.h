@@ -2,8 +2,7 @@
 
 #include "fbxsdk/Limits.h"
 #include "fbxsdk/container/ElementTree.h"
-
-#include <vector>
+#include "fbxsdk/container/Numbers.h"
 
 namespace FbxFormat
 {
@@ -29,7 +28,7 @@ std::uint64_t DecodedBytes(const VElementTree& i_rTree, VElementIndex i_Element)
 
 /// ReadArray without the budget, which was charged. Any number of threads may read different arrays of a tree.
 template <typename T>
-bool ReadCharged(const VElementTree& i_rTree, VElementIndex i_Element, std::vector<T>& o_rNumbers);
+bool ReadCharged(const VElementTree& i_rTree, VElementIndex i_Element, VArrayNumbers<T>& o_rNumbers);
 
 /// All numbers of a record, whichever way it holds them: a deflated or plain array, the text of one, or a list of
 /// values. T is float, double, std::int32_t or std::int64_t; other types in the file are converted.
@@ -37,7 +36,7 @@ bool ReadCharged(const VElementTree& i_rTree, VElementIndex i_Element, std::vect
 /// empty.
 template <typename T>
 bool ReadArray(
-    const VElementTree& i_rTree, VElementIndex i_Element, VDecodeBudget& io_rBudget, std::vector<T>& o_rNumbers)
+    const VElementTree& i_rTree, VElementIndex i_Element, VDecodeBudget& io_rBudget, VArrayNumbers<T>& o_rNumbers)
 {
 	o_rNumbers.clear();
 	return io_rBudget.Take(DecodedBytes<T>(i_rTree, i_Element)) && ReadCharged(i_rTree, i_Element, o_rNumbers);

@@ -15,7 +15,7 @@ constexpr std::size_t c_BytesForTwo = 100'000;
 
 std::uint64_t CostOf(const VDecodeJob& i_rJob)
 {
-	return std::visit([&]<typename T>(const std::vector<T>*)
+	return std::visit([&]<typename T>(const VArrayNumbers<T>*)
 	    { return DecodedBytes<T>(*i_rJob.m_Source.m_pTree, i_rJob.m_Source.m_Element); },
 	    i_rJob.m_pNumbers);
 }

@@ -28,7 +28,7 @@ struct VDecodeJob
 	VArraySource m_Source;
 	/// For messages.
 	const char* m_pOwner = "";
-	std::variant<std::vector<double>*, std::vector<std::int32_t>*> m_pNumbers;
+	std::variant<VArrayNumbers<double>*, VArrayNumbers<std::int32_t>*> m_pNumbers;
 	/// False, with no numbers, if the array is damaged or beyond the budget. One that the file does not have is sound.
 	bool m_bSound = true;
 };

@@ -14,13 +14,13 @@ using namespace FbxFormat;
 constexpr std::string_view c_Diffuse = "DiffuseColor";
 
 /// For each polygon a place in a list; a single one is that of all.
-std::vector<std::int32_t> PlacesOf(
+VArrayNumbers<std::int32_t> PlacesOf(
     const VArraySource& i_rMesh, const char* i_pLayer, const char* i_pPlaces, const char* i_pNode)
 {
 	const VArraySource layer = i_rMesh.m_Element == c_NoElement ? i_rMesh : i_rMesh.Child(i_pLayer);
 	if (layer.m_Element == c_NoElement)
 		return {};
-	std::vector<std::int32_t> places;
+	VArrayNumbers<std::int32_t> places;
 	(void)Decode({layer.Child(i_pPlaces), i_pNode, &places});
 	const VElementIndex mapping = layer.Child("MappingInformationType").m_Element;
 	const std::string_view mode =
@@ -37,14 +37,14 @@ std::vector<std::int32_t> PlacesOf(
 void FbxFormat::ConnectLegacyTextures(const VArraySource& i_rMesh, const char* i_pNode,
     std::span<fbxsdk::FbxFileTexture* const> i_Textures, std::span<fbxsdk::FbxSurfaceMaterial* const> i_Materials)
 {
-	const std::vector<std::int32_t> textures = PlacesOf(i_rMesh, "LayerElementTexture", "TextureId", i_pNode);
+	const VArrayNumbers<std::int32_t> textures = PlacesOf(i_rMesh, "LayerElementTexture", "TextureId", i_pNode);
 	if (textures.empty())
 	{
 		for (fbxsdk::FbxSurfaceMaterial* const pMaterial : i_Materials)
 			VMaterialReader::Connect(*i_Textures.front(), *pMaterial, c_Diffuse);
 		return;
 	}
-	const std::vector<std::int32_t> materials = PlacesOf(i_rMesh, "LayerElementMaterial", "Materials", i_pNode);
+	const VArrayNumbers<std::int32_t> materials = PlacesOf(i_rMesh, "LayerElementMaterial", "Materials", i_pNode);
 	constexpr std::int32_t c_Unknown = -2;
 	std::vector<std::int32_t> textureOf(i_Materials.size(), c_Unknown);
 	bool bSeveral = false;

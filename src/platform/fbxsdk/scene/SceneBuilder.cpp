@@ -271,6 +271,13 @@ void FbxFormat::VSceneBuilder::ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::
 	}
 }
 
+void FbxFormat::VSceneBuilder::AddSkin(fbxsdk::FbxMesh& io_rMesh, fbxsdk::FbxSkin& io_rSkin)
+{
+	io_rMesh.m_Skins.push_back(&io_rSkin);
+	if (!io_rSkin.m_pMesh)
+		io_rSkin.m_pMesh = &io_rMesh;
+}
+
 void FbxFormat::VSceneBuilder::ConnectParts(
     const VBuilt& i_rChild, const VBuilt& i_rParent, std::string_view i_Property)
 {
@@ -302,14 +309,14 @@ void FbxFormat::VSceneBuilder::ConnectParts(
 		else if (FbxSurfaceMaterial* const pMaterial = child(c_pMaterial))
 			rData.m_Materials.push_back(pMaterial);
 		else if (FbxSkin* const pSkin = child(c_pSkin); pSkin && rData.m_pMesh)
-			rData.m_pMesh->m_Skins.push_back(pSkin);
+			AddSkin(*rData.m_pMesh, *pSkin);
 		else if (FbxFileTexture* const pTexture = child(c_pTexture))
 			m_TexturesOfNodes[pNode].push_back(pTexture);
 	}
 	else if (child(c_pVideo) && parent(c_pTexture))
 		parent(c_pTexture)->m_pVideo = child(c_pVideo);
 	else if (child(c_pSkin) && parent(c_pMesh))
-		parent(c_pMesh)->m_Skins.push_back(child(c_pSkin));
+		AddSkin(*parent(c_pMesh), *child(c_pSkin));
 	else if (child(c_pCluster) && parent(c_pSkin))
 	{
 		parent(c_pSkin)->m_Clusters.push_back(child(c_pCluster));

@@ -62,6 +62,7 @@ private:
 	template <typename T>
 	T* AddPart(T* i_pPart);
 	VBuilt BuildPart(const struct VObject& i_rObject, const class VMaterialReader& i_rMaterials);
+	static void AddSkin(fbxsdk::FbxMesh& io_rMesh, fbxsdk::FbxSkin& io_rSkin);
 	void ConnectParts(const VBuilt& i_rChild, const VBuilt& i_rParent, std::string_view i_Property);
 
 	fbxsdk::FbxScene& m_rScene;

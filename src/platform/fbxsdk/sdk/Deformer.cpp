@@ -1,6 +1,7 @@
 #include "fbxsdk/sdk/Deformer.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "fbxsdk/sdk/Mesh.h"
 
 #include <algorithm>
 
@@ -14,16 +15,22 @@ void fbxsdk::FbxCluster::Load() const
 {
 	if (m_bLoaded)
 		return;
-	// Who reads one reads them all.
+	// Who reads one reads them all, and their mesh.
 	std::vector<const FbxCluster*> clusters{this};
 	if (m_pSkin)
 		for (const FbxCluster* const pOther : m_pSkin->m_Clusters)
 			if (!pOther->m_bLoaded && pOther->m_pSkin == m_pSkin && pOther != this)
 				clusters.push_back(pOther);
 	std::vector<FbxFormat::VDecodeJob> jobs;
+	const FbxMesh* const pMesh =
+	    m_pSkin && m_pSkin->m_pMesh && !m_pSkin->m_pMesh->m_bLoaded ? m_pSkin->m_pMesh : nullptr;
+	if (pMesh)
+		pMesh->AddJobs(jobs);
 	for (const FbxCluster* const pCluster : clusters)
 		pCluster->AddJobs(jobs);
 	FbxFormat::Decode(jobs);
+	if (pMesh)
+		pMesh->EndJobs(jobs);
 	for (const FbxCluster* const pCluster : clusters)
 		pCluster->EndJobs();
 }
@@ -63,7 +70,7 @@ const fbxsdk::FbxAMatrix& fbxsdk::FbxCluster::Matrix(
 	if (io_rpMatrix)
 		return *io_rpMatrix;
 	FbxAMatrix matrix;
-	std::vector<double> entries;
+	FbxFormat::VArrayNumbers<double> entries;
 	FbxFormat::Decode({m_Record.Child(i_pName), GetName(), &entries});
 	if (entries.size() == 16)
 		for (int i = 0; i < 16; ++i)

@@ -14,6 +14,7 @@ class VSceneBuilder;
 namespace fbxsdk
 {
 
+class FbxMesh;
 class FbxNode;
 class FbxSkin;
 
@@ -66,8 +67,8 @@ private:
 	/// The first that it belongs to.
 	const FbxSkin* m_pSkin = nullptr;
 	mutable bool m_bLoaded = false;
-	mutable std::vector<int> m_Indices;
-	mutable std::vector<double> m_Weights;
+	mutable FbxFormat::VArrayNumbers<int> m_Indices;
+	mutable FbxFormat::VArrayNumbers<double> m_Weights;
 	mutable std::unique_ptr<FbxAMatrix> m_pMatrix;
 	mutable std::unique_ptr<FbxAMatrix> m_pLinkMatrix;
 };
@@ -88,6 +89,8 @@ private:
 	using FbxDeformer::FbxDeformer;
 
 	std::vector<FbxCluster*> m_Clusters;
+	/// The first that it moves.
+	const FbxMesh* m_pMesh = nullptr;
 };
 
 } // namespace fbxsdk

@@ -62,10 +62,10 @@ private:
 	template <typename TOther>
 	friend class FbxLayerElementTemplate;
 
-	std::vector<typename FbxLayerElementEntry<T>::VNumber>& Numbers() { return m_Numbers; }
+	FbxFormat::VArrayNumbers<typename FbxLayerElementEntry<T>::VNumber>& Numbers() { return m_Numbers; }
 	void Count() { m_Count = int(m_Numbers.size() / FbxLayerElementEntry<T>::c_Size); }
 
-	std::vector<typename FbxLayerElementEntry<T>::VNumber> m_Numbers;
+	FbxFormat::VArrayNumbers<typename FbxLayerElementEntry<T>::VNumber> m_Numbers;
 };
 
 class FbxLayerElement
@@ -121,7 +121,7 @@ private:
 	friend class FbxMesh;
 
 	/// Of these numbers, one entry for each control point.
-	explicit FbxLayerElementTemplate(std::vector<typename FbxLayerElementEntry<T>::VNumber> i_Numbers)
+	explicit FbxLayerElementTemplate(FbxFormat::VArrayNumbers<typename FbxLayerElementEntry<T>::VNumber> i_Numbers)
 	{
 		m_MappingMode = eByControlPoint;
 		m_Direct.Numbers() = std::move(i_Numbers);

@@ -77,17 +77,27 @@ bool fbxsdk::FbxMesh::IsSound() const
 
 void fbxsdk::FbxMesh::LoadArrays() const
 {
-	m_bLoaded = true;
-	std::vector<FbxFormat::VDecodeJob> jobs{{m_Record.Child("Vertices"), GetName(), &m_Points},
-	    {m_Record.Child("PolygonVertexIndex"), GetName(), &m_PolygonVertices}};
-	// Who reads a mesh asks for its texture coordinates next.
-	const FbxGeometryElementUV* const pUV = Element(m_UVs, c_pUVs, "UV", "UVIndex", 0);
-	if (pUV)
-		pUV->AddJobs(jobs);
+	std::vector<FbxFormat::VDecodeJob> jobs;
+	AddJobs(jobs);
 	FbxFormat::Decode(jobs);
-	if (pUV)
+	EndJobs(jobs);
+}
+
+void fbxsdk::FbxMesh::AddJobs(std::vector<FbxFormat::VDecodeJob>& io_rJobs) const
+{
+	io_rJobs.push_back({m_Record.Child("Vertices"), GetName(), &m_Points});
+	io_rJobs.push_back({m_Record.Child("PolygonVertexIndex"), GetName(), &m_PolygonVertices});
+	// Who reads a mesh asks for its texture coordinates next.
+	if (const FbxGeometryElementUV* const pUV = Element(m_UVs, c_pUVs, "UV", "UVIndex", 0))
+		pUV->AddJobs(io_rJobs);
+}
+
+void fbxsdk::FbxMesh::EndJobs(std::span<const FbxFormat::VDecodeJob> i_Jobs) const
+{
+	m_bLoaded = true;
+	if (const FbxGeometryElementUV* const pUV = Element(m_UVs, c_pUVs, "UV", "UVIndex", 0))
 		pUV->EndJobs();
-	m_bSound = jobs[0].m_bSound && jobs[1].m_bSound;
+	m_bSound = i_Jobs[0].m_bSound && i_Jobs[1].m_bSound;
 	if (m_bSound)
 		CutPolygons();
 	else
@@ -144,38 +154,47 @@ bool fbxsdk::FbxMesh::GenerateNormals(bool pOverwrite, bool pByCtrlPoint, bool p
 {
 	if (!pByCtrlPoint || (!pOverwrite && GetElementNormal()))
 		return false;
-	std::vector<double> normals(3 * std::size_t(GetControlPointsCount()), 0.0);
+	FbxFormat::VArrayNumbers<double> normals(3 * std::size_t(GetControlPointsCount()), 0.0);
 	for (int polygon = 0; polygon < GetPolygonCount(); ++polygon)
 	{
 		const int size = m_PolygonSizes[polygon];
 		const int* const pVertices = m_PolygonVertices.data() + m_PolygonStarts[polygon];
 		// Twice the area vector: sum of the cross products of edges from the first vertex, so that the place of the
-		// polygon costs no digits.
+		// polygon costs no digits. Of two triangles it is that of the diagonals.
 		double area[3]{};
-		for (int i = 1; i + 1 < size; ++i)
+		const auto add = [&](int i_A, int i_B, int i_C, int i_D)
 		{
-			const double* const a = m_Points.data() + 3 * std::size_t(pVertices[0]);
-			const double* const b = m_Points.data() + 3 * std::size_t(pVertices[i]);
-			const double* const c = m_Points.data() + 3 * std::size_t(pVertices[i + 1]);
-			for (int x = 0; x < 3; ++x)
-			{
-				const int y = (x + 1) % 3;
-				const int z = (x + 2) % 3;
-				area[x] += (b[y] - a[y]) * (c[z] - a[z]) - (b[z] - a[z]) * (c[y] - a[y]);
-			}
-		}
+			const double* const a = m_Points.data() + 3 * std::size_t(pVertices[i_A]);
+			const double* const b = m_Points.data() + 3 * std::size_t(pVertices[i_B]);
+			const double* const c = m_Points.data() + 3 * std::size_t(pVertices[i_C]);
+			const double* const d = m_Points.data() + 3 * std::size_t(pVertices[i_D]);
+			const double first[3]{b[0] - a[0], b[1] - a[1], b[2] - a[2]};
+			const double second[3]{d[0] - c[0], d[1] - c[1], d[2] - c[2]};
+			area[0] += first[1] * second[2] - first[2] * second[1];
+			area[1] += first[2] * second[0] - first[0] * second[2];
+			area[2] += first[0] * second[1] - first[1] * second[0];
+		};
+		if (size == 4)
+			add(0, 2, 1, 3);
+		else
+			for (int i = 1; i + 1 < size; ++i)
+				add(0, i, 0, i + 1);
+		const double sign = pCW ? -1.0 : 1.0;
 		for (int i = 0; i < size; ++i)
+		{
+			double* const pNormal = normals.data() + 3 * std::size_t(pVertices[i]);
 			for (int x = 0; x < 3; ++x)
-				normals[3 * std::size_t(pVertices[i]) + x] += pCW ? -area[x] : area[x];
+				pNormal[x] += sign * area[x];
+		}
 	}
 	for (std::size_t i = 0; i < normals.size(); i += 3)
 	{
 		double square = 0.0;
 		for (int x = 0; x < 3; ++x)
 			square += normals[i + x] * normals[i + x];
-		const double length = std::sqrt(square);
+		const double scale = square > 0.0 && std::isfinite(square) ? 1.0 / std::sqrt(square) : 0.0;
 		for (int x = 0; x < 3; ++x)
-			normals[i + x] = length > 0.0 && std::isfinite(length) ? normals[i + x] / length : 0.0;
+			normals[i + x] = scale > 0.0 ? normals[i + x] * scale : 0.0;
 	}
 	m_Normals[0].reset(new FbxGeometryElementNormal(std::move(normals)));
 	return true;

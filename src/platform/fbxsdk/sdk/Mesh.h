@@ -60,7 +60,7 @@ protected:
 	FbxFormat::VArraySource m_Record;
 	mutable bool m_bLoaded = false;
 	/// Three for each point.
-	mutable std::vector<double> m_Points;
+	mutable FbxFormat::VArrayNumbers<double> m_Points;
 	VElements<FbxGeometryElementNormal> m_Normals;
 	mutable VElements<FbxGeometryElementUV> m_UVs;
 	VElements<FbxGeometryElementMaterial> m_Materials;
@@ -115,6 +115,7 @@ public:
 	bool GenerateNormals(bool pOverwrite = false, bool pByCtrlPoint = false, bool pCW = false);
 
 private:
+	friend class FbxCluster;
 	friend class FbxFormat::VSceneBuilder;
 	friend class FbxNode;
 
@@ -123,10 +124,14 @@ private:
 	/// False if control points or polygons are damaged.
 	bool IsSound() const;
 	void LoadArrays() const override;
+	/// For decoding it together with others.
+	void AddJobs(std::vector<FbxFormat::VDecodeJob>& io_rJobs) const;
+	/// After them; they begin with those of this mesh.
+	void EndJobs(std::span<const FbxFormat::VDecodeJob> i_Jobs) const;
 	void CutPolygons() const;
 
 	mutable bool m_bSound = false;
-	mutable std::vector<int> m_PolygonVertices;
+	mutable FbxFormat::VArrayNumbers<int> m_PolygonVertices;
 	mutable std::vector<int> m_PolygonStarts;
 	mutable std::vector<int> m_PolygonSizes;
 };
