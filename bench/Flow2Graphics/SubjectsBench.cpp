@@ -1,4 +1,4 @@
-#include "../Ratios.h"
+#include "../Frames.h"
 
 #include "CoreGraphics/ShaderLibrary.h"
 #include "CoreOrlexTypes/Subject.h"
@@ -7,24 +7,14 @@
 #include "InMemoryHost/Dispatcher.h"
 #include "InMemoryHost/Flow.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/FrameRenderer.h"
 #include "OrlexGraphics/RenderManipulator.h"
 
-#include <QGuiApplication>
-#include <QOffscreenSurface>
-#include <QOpenGLContext>
-#include <QOpenGLFramebufferObject>
-#include <QOpenGLFunctions>
-
-#include <cstdio>
-
 // What two subjects cost, with bones, joints, axes, targets and the manipulator, beside a frame that only clears. The
-// argument is the number of segments of each. Needs a display.
+// argument is the number of segments of each.
 
 namespace
 {
 
-const QSize c_Size(1280, 720);
 constexpr std::uint32_t c_Id = 7;
 
 /// Five limbs, a target on each segment.
@@ -56,133 +46,81 @@ CoreOrlexTypes::VSubject MakeSubject(std::uint32_t i_Segments)
 	return subject;
 }
 
-struct VBench
+NVX::CountedPointer<TesselPluginInterface::IFlowFrame> MakeFrame(std::uint32_t i_Segments)
 {
-	explicit VBench(std::uint32_t i_Segments)
-	    : m_pScene(std::make_shared<Flow2Graphics::VFlowScene>(std::make_shared<CoreGraphics::VShaderLibrary>(),
-	        std::make_shared<InMemoryHost::VSelectionManager>(), nullptr, std::make_shared<InMemoryHost::VDispatcher>(),
-	        false))
+	InMemoryHost::VItemFactory factory;
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pFrame(new InMemoryHost::VFlowFrame);
+	const auto add = [&](const char* i_pFlowType, auto i_Value)
 	{
-		m_Renderer.Initialise();
-		OrlexGraphics::VSceneOptions& rOptions = m_Renderer.m_Input.m_Options;
-		rOptions.m_bFloorGrid = rOptions.m_bGlobalAxis = false;
-		rOptions.m_LabellingSubject.m_bJoints = rOptions.m_LabellingSubject.m_bAxes =
-		    rOptions.m_LabellingSubject.m_bTargets = true;
-		rOptions.m_SolvingSubject = rOptions.m_LabellingSubject;
-		m_Renderer.m_Input.m_Camera.SetSize(c_Size);
-		m_Renderer.SetScene(m_pScene);
-		m_Renderer.SetSize(c_Size);
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Size, m_Renderer.TargetFormat());
-		if (i_Segments > 0)
-		{
-			ShowSubjects(i_Segments);
-			m_pScene->RenderManipulator()->SetVisible(true);
-		}
-		m_pScene->Synchronise();
-		Update();
-		m_Renderer.Render(*m_pTarget);
-		Finish();
-	}
+		const auto pItem = factory.CreateItem(i_pFlowType);
+		TesselPluginInterface::SetItemValue(pItem, std::make_shared<const decltype(i_Value)>(i_Value));
+		pFrame->AddItem(pItem);
+	};
+	const CoreOrlexTypes::VSubjectDynamicParameters pose{c_Id, {}};
+	add("FlowSubject", MakeSubject(i_Segments));
+	add("FlowSubjectDynamicParameters", pose);
+	add("FlowSubjectForSolving", MakeSubject(i_Segments));
+	add("FlowSubjectDynamicParametersForSolving", pose);
+	return pFrame;
+}
 
-	void ShowSubjects(std::uint32_t i_Segments)
-	{
-		InMemoryHost::VItemFactory factory;
-		NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pFrame(new InMemoryHost::VFlowFrame);
-		const auto add = [&](const char* i_pFlowType, auto i_Value)
-		{
-			const auto pItem = factory.CreateItem(i_pFlowType);
-			TesselPluginInterface::SetItemValue(pItem, std::make_shared<const decltype(i_Value)>(i_Value));
-			pFrame->AddItem(pItem);
-		};
-		const CoreOrlexTypes::VSubjectDynamicParameters pose{c_Id, {}};
-		add("FlowSubject", MakeSubject(i_Segments));
-		add("FlowSubjectDynamicParameters", pose);
-		add("FlowSubjectForSolving", MakeSubject(i_Segments));
-		add("FlowSubjectDynamicParametersForSolving", pose);
-		m_pScene->SetFrame(pFrame);
-	}
-
-	void Update()
-	{
-		m_pScene->SetNeedsRefresh();
-		m_Renderer.Update();
-	}
-
-	static void Finish() { QOpenGLContext::currentContext()->functions()->glFinish(); }
-
-	const std::shared_ptr<Flow2Graphics::VFlowScene> m_pScene;
-	OrlexGraphics::VFrameRenderer m_Renderer;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
-};
-
-void DrawFrames(benchmark::State& io_rState, VBench& io_rBench)
+/// Two subjects of so many segments and the manipulator, or nothing.
+Frames::VDrawing MakeDrawing(std::uint32_t i_Segments)
 {
-	for (auto _ : io_rState)
+	const auto pScene = std::make_shared<Flow2Graphics::VFlowScene>(std::make_shared<CoreGraphics::VShaderLibrary>(),
+	    std::make_shared<InMemoryHost::VSelectionManager>(), nullptr, std::make_shared<InMemoryHost::VDispatcher>(),
+	    false);
+	Frames::VDrawing drawing(pScene);
+	OrlexGraphics::VSubjectOptions& rOptions = drawing.Options().m_LabellingSubject;
+	rOptions.m_bJoints = rOptions.m_bAxes = rOptions.m_bTargets = true;
+	drawing.Options().m_SolvingSubject = rOptions;
+	if (i_Segments > 0)
 	{
-		io_rBench.m_Renderer.Render(*io_rBench.m_pTarget);
-		VBench::Finish();
+		pScene->SetFrame(MakeFrame(i_Segments));
+		pScene->RenderManipulator()->SetVisible(true);
 	}
+	return drawing;
+}
+
+std::uint32_t Segments(const benchmark::State& i_rState)
+{
+	return static_cast<std::uint32_t>(i_rState.range(0));
 }
 
 void ClearedFrame(benchmark::State& io_rState)
 {
-	VBench bench(0);
-	DrawFrames(io_rState, bench);
+	MakeDrawing(0).MeasureFrames(io_rState);
 }
 
 void SubjectsFrame(benchmark::State& io_rState)
 {
-	VBench bench(static_cast<std::uint32_t>(io_rState.range(0)));
-	DrawFrames(io_rState, bench);
+	MakeDrawing(Segments(io_rState)).MeasureFrames(io_rState);
 }
 
 void SubjectsHoverPick(benchmark::State& io_rState)
 {
-	VBench bench(static_cast<std::uint32_t>(io_rState.range(0)));
-	OrlexGraphics::VPickRequest request;
-	request.m_Mouse = QPoint(c_Size.width() / 2, c_Size.height() / 2);
-	OrlexGraphics::VPick pick;
-	// The first one makes the framebuffer.
-	bench.m_Renderer.Pick(request, pick);
-	for (auto _ : io_rState)
-	{
-		bench.m_Renderer.Pick(request, pick);
-		VBench::Finish();
-	}
-	if (pick.m_Items.empty())
-		io_rState.SkipWithError("nothing was found");
+	MakeDrawing(Segments(io_rState)).MeasurePicks(io_rState, false);
 }
 
 void SubjectsUpdate(benchmark::State& io_rState)
 {
-	VBench bench(static_cast<std::uint32_t>(io_rState.range(0)));
-	for (auto _ : io_rState)
-		bench.Update();
+	MakeDrawing(Segments(io_rState)).MeasureUpdates(io_rState);
 }
 
-void Segments(benchmark::internal::Benchmark* io_pBenchmark)
+void Subjects(benchmark::internal::Benchmark* io_pBenchmark)
 {
 	io_pBenchmark->Arg(70)->Arg(300)->MeasureProcessCPUTime()->Unit(benchmark::kMicrosecond);
 }
 
-BENCHMARK(ClearedFrame)->Apply(Segments);
-BENCHMARK(SubjectsFrame)->Apply(Segments);
-BENCHMARK(SubjectsHoverPick)->Apply(Segments);
-BENCHMARK(SubjectsUpdate)->Apply(Segments);
+BENCHMARK(ClearedFrame)->Apply(Subjects);
+BENCHMARK(SubjectsFrame)->Apply(Subjects);
+BENCHMARK(SubjectsHoverPick)->Apply(Subjects);
+BENCHMARK(SubjectsUpdate)->Apply(Subjects);
 
 } // namespace
 
 int main(int i_Count, char** i_ppArguments)
 {
-	QGuiApplication application(i_Count, i_ppArguments);
-	QOffscreenSurface surface;
-	surface.create();
-	QOpenGLContext context;
-	if (!context.create() || !context.makeCurrent(&surface))
-	{
-		std::puts("No OpenGL here, nothing is measured.");
-		return 0;
-	}
-	return Ratios::Main(
+	return Frames::Main(
 	    i_Count, i_ppArguments, {{"SubjectsFrame", "ClearedFrame", 10.0}, {"SubjectsHoverPick", "ClearedFrame", 2.0}});
 }

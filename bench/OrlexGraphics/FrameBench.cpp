@@ -1,29 +1,19 @@
-#include "../Ratios.h"
+#include "../Frames.h"
 
 #include "CoreGraphics/ShaderLibrary.h"
 #include "Flow2Graphics/FlowScene.h"
 #include "InMemoryHost/Dispatcher.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/FrameRenderer.h"
 #include "OrlexGraphics/IRenderType.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SphereHelper.h"
 
-#include <QGuiApplication>
-#include <QOffscreenSurface>
-#include <QOpenGLContext>
-#include <QOpenGLFramebufferObject>
-#include <QOpenGLFunctions>
-
 #include <cmath>
-#include <cstdio>
 
-// What a frame and a pick cost without a window, beside a frame that only clears. Needs a display.
+// What a frame and a pick cost without a window, beside a frame that only clears.
 
 namespace
 {
-
-const QSize c_Size(1280, 720);
 
 /// Items that can be picked, all over the view.
 class VSpheres : public OrlexGraphics::IRenderType
@@ -88,103 +78,55 @@ private:
 	std::shared_ptr<VSpheres> m_pSpheres;
 };
 
-/// A scene of so many items, of which so many are selected, ready to be drawn.
-struct VBench
+/// A scene of so many items, of which so many are selected.
+Frames::VDrawing MakeDrawing(int i_Count, std::uint32_t i_Selected = 0)
 {
-	VBench(int i_Count, std::uint32_t i_Selected)
-	{
-		std::vector<NVX::ISelectionItem> selected;
-		for (std::uint32_t i = 0; i < i_Selected; ++i)
-			selected.push_back({NVX::ESelectionTargetSegment, 0x0fffffff, i, {}});
-		m_pSelection->Selection().Replace(selected);
-		m_pScene = std::make_shared<VScene>(std::make_shared<CoreGraphics::VShaderLibrary>(), m_pSelection, nullptr,
-		    std::make_shared<InMemoryHost::VDispatcher>(), false);
-		m_pScene->m_Count = i_Count;
-		m_Renderer.Initialise();
-		// What is measured is the walk, not what else a scene shows.
-		m_Renderer.m_Input.m_Options.m_bFloorGrid = false;
-		m_Renderer.m_Input.m_Options.m_bGlobalAxis = false;
-		m_Renderer.m_Input.m_Camera.SetSize(c_Size);
-		m_Renderer.SetScene(m_pScene);
-		m_Renderer.SetSize(c_Size);
-		m_pTarget = std::make_unique<QOpenGLFramebufferObject>(c_Size, m_Renderer.TargetFormat());
-		m_pScene->Synchronise();
-		m_Renderer.Update();
-		m_Renderer.Render(*m_pTarget);
-		Finish();
-	}
+	std::vector<NVX::ISelectionItem> selected;
+	for (std::uint32_t i = 0; i < i_Selected; ++i)
+		selected.push_back({NVX::ESelectionTargetSegment, 0x0fffffff, i, {}});
+	const auto pSelection = std::make_shared<InMemoryHost::VSelectionManager>();
+	pSelection->Selection().Replace(selected);
+	const auto pScene = std::make_shared<VScene>(std::make_shared<CoreGraphics::VShaderLibrary>(), pSelection, nullptr,
+	    std::make_shared<InMemoryHost::VDispatcher>(), false);
+	pScene->m_Count = i_Count;
+	return Frames::VDrawing(pScene);
+}
 
-	static void Finish() { QOpenGLContext::currentContext()->functions()->glFinish(); }
-
-	const std::shared_ptr<InMemoryHost::VSelectionManager> m_pSelection =
-	    std::make_shared<InMemoryHost::VSelectionManager>();
-	std::shared_ptr<VScene> m_pScene;
-	OrlexGraphics::VFrameRenderer m_Renderer;
-	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
-};
-
-void DrawFrame(benchmark::State& io_rState, VBench& io_rBench)
+int Count(const benchmark::State& i_rState)
 {
-	for (auto _ : io_rState)
-	{
-		io_rBench.m_Renderer.Render(*io_rBench.m_pTarget);
-		VBench::Finish();
-	}
+	return static_cast<int>(i_rState.range(0));
 }
 
 void ClearedFrame(benchmark::State& io_rState)
 {
-	VBench bench(0, 0);
-	DrawFrame(io_rState, bench);
+	MakeDrawing(0).MeasureFrames(io_rState);
 }
 
 void FloorFrame(benchmark::State& io_rState)
 {
-	VBench bench(0, 0);
-	bench.m_Renderer.m_Input.m_Options.m_bFloorGrid = true;
-	DrawFrame(io_rState, bench);
+	Frames::VDrawing drawing = MakeDrawing(0);
+	drawing.Options().m_bFloorGrid = true;
+	drawing.MeasureFrames(io_rState);
 }
 
 void Frame(benchmark::State& io_rState)
 {
-	VBench bench(static_cast<int>(io_rState.range(0)), 0);
-	DrawFrame(io_rState, bench);
+	MakeDrawing(Count(io_rState)).MeasureFrames(io_rState);
 }
 
 void OutlinedFrame(benchmark::State& io_rState)
 {
-	VBench bench(static_cast<int>(io_rState.range(0)), 2);
-	DrawFrame(io_rState, bench);
-}
-
-void Pick(benchmark::State& io_rState, bool i_bRectangle)
-{
-	VBench bench(static_cast<int>(io_rState.range(0)), 0);
-	OrlexGraphics::VPickRequest request;
-	request.m_Mouse = QPoint(c_Size.width() / 2, c_Size.height() / 2);
-	request.m_bRectangle = i_bRectangle;
-	request.m_Start = QPoint(c_Size.width() / 4, c_Size.height() / 4);
-	OrlexGraphics::VPick pick;
-	// The first one makes the framebuffer.
-	bench.m_Renderer.Pick(request, pick);
-	VBench::Finish();
-	for (auto _ : io_rState)
-	{
-		bench.m_Renderer.Pick(request, pick);
-		VBench::Finish();
-	}
-	if (pick.m_Items.empty())
-		io_rState.SkipWithError("nothing was found");
+	MakeDrawing(Count(io_rState), 2).MeasureFrames(io_rState);
 }
 
 void HoverPick(benchmark::State& io_rState)
 {
-	Pick(io_rState, false);
+	MakeDrawing(Count(io_rState)).MeasurePicks(io_rState, false);
 }
 
 void RectanglePick(benchmark::State& io_rState)
 {
-	Pick(io_rState, true);
+	MakeDrawing(Count(io_rState)).MeasurePicks(io_rState, true);
 }
 
 void Items(benchmark::internal::Benchmark* io_pBenchmark)
@@ -203,15 +145,7 @@ BENCHMARK(RectanglePick)->Apply(Items);
 
 int main(int i_Count, char** i_ppArguments)
 {
-	QGuiApplication application(i_Count, i_ppArguments);
-	QOffscreenSurface surface;
-	surface.create();
-	QOpenGLContext context;
-	if (!context.create() || !context.makeCurrent(&surface))
-	{
-		std::puts("No OpenGL here, nothing is measured.");
-		return 0;
-	}
-	return Ratios::Main(i_Count, i_ppArguments,
-	    {{"HoverPick", "ClearedFrame", 2.0}, {"Frame", "ClearedFrame", 10.0}, {"OutlinedFrame", "ClearedFrame", 10.0}});
+	return Frames::Main(i_Count, i_ppArguments,
+	    {{"HoverPick", "ClearedFrame", 2.0}, {"Frame", "ClearedFrame", 10.0}, {"OutlinedFrame", "ClearedFrame", 10.0},
+	        {"FloorFrame", "ClearedFrame", 10.0}});
 }

@@ -390,6 +390,9 @@ TEST_P(RenderContext, TexturesAreReadAsTheSamplingSays)
 	sampling.m_Minification = 77;
 	// More than there is.
 	sampling.m_Anisotropy = 1e6f;
+	EXPECT_TRUE(m_Render.m_bSoftware);
+	EXPECT_EQ(m_Render.m_MostAnisotropy, 1.0f);
+	m_Render.m_MostAnisotropy = 4.0f;
 	pTexture->Bind(m_Render, 2, sampling);
 	GLint value = 0;
 	const auto parameter = [&](GLenum i_Name)
@@ -398,6 +401,8 @@ TEST_P(RenderContext, TexturesAreReadAsTheSamplingSays)
 		return value;
 	};
 	EXPECT_EQ(parameter(GL_TEXTURE_MIN_FILTER), GL_NEAREST_MIPMAP_NEAREST);
+	constexpr GLenum c_Anisotropy = 0x84FE;
+	EXPECT_EQ(parameter(c_Anisotropy), 4);
 	EXPECT_EQ(parameter(GL_TEXTURE_MAG_FILTER), GL_LINEAR);
 	EXPECT_EQ(parameter(GL_TEXTURE_WRAP_S), GL_REPEAT);
 	EXPECT_EQ(parameter(GL_TEXTURE_WRAP_T), GL_CLAMP_TO_EDGE);

@@ -12,6 +12,7 @@
 #include <QOpenGLShaderProgram>
 
 #include <array>
+#include <cstring>
 
 // What only desktop OpenGL before the core profile has.
 #ifndef GL_VERTEX_PROGRAM_POINT_SIZE
@@ -22,6 +23,9 @@
 #endif
 #ifndef GL_POINT_SMOOTH
 #define GL_POINT_SMOOTH 0x0B10
+#endif
+#ifndef GL_MAX_TEXTURE_MAX_ANISOTROPY_EXT
+#define GL_MAX_TEXTURE_MAX_ANISOTROPY_EXT 0x84FF
 #endif
 
 namespace CoreGraphics
@@ -46,6 +50,17 @@ QVector2D AsVector(const QSize& i_rSize)
 	return {static_cast<float>(i_rSize.width()), static_cast<float>(i_rSize.height())};
 }
 
+bool IsSoftware(QOpenGLFunctions& i_rFunctions)
+{
+	const auto* const pName = reinterpret_cast<const char*>(i_rFunctions.glGetString(GL_RENDERER));
+	if (!pName)
+		return false;
+	for (const char* const pSoftware : {"llvmpipe", "softpipe", "swrast", "Software", "SWR", "GDI Generic", "WARP"})
+		if (std::strstr(pName, pSoftware))
+			return true;
+	return false;
+}
+
 } // namespace
 
 void VRenderContext::Initialise()
@@ -53,6 +68,10 @@ void VRenderContext::Initialise()
 	m_pContext = QOpenGLContext::currentContext();
 	// Resolved by the context, once for all who ask.
 	m_pFunctions = m_pContext->functions();
+	m_bSoftware = IsSoftware(*m_pFunctions);
+	m_MostAnisotropy = 1.0f;
+	if (!m_bSoftware && m_pContext->hasExtension("GL_EXT_texture_filter_anisotropic"))
+		m_pFunctions->glGetFloatv(GL_MAX_TEXTURE_MAX_ANISOTROPY_EXT, &m_MostAnisotropy);
 	SetClearColour(QColor(25, 25, 25, 255));
 	VTexture::DeleteReleased();
 }

@@ -70,6 +70,11 @@ public:
 
 	QOpenGLContext* m_pContext = nullptr;
 	QOpenGLFunctions* m_pFunctions = nullptr;
+	/// Whether the processor draws. Set by Initialise, like the next one.
+	bool m_bSoftware = false;
+	/// The most that textures can be sharpened with where they are seen at a slant. 1, for not at all, where the
+	/// processor draws: it would spend most of a frame on it.
+	float m_MostAnisotropy = 1.0f;
 	std::bitset<c_AttributeArrays> m_EnabledAttributes;
 	QMatrix4x4 m_Projection;
 	QMatrix4x4 m_View;

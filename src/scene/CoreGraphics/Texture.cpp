@@ -33,7 +33,6 @@
 #endif
 #ifndef GL_TEXTURE_MAX_ANISOTROPY_EXT
 #define GL_TEXTURE_MAX_ANISOTROPY_EXT 0x84FE
-#define GL_MAX_TEXTURE_MAX_ANISOTROPY_EXT 0x84FF
 #endif
 
 namespace CoreGraphics
@@ -210,12 +209,9 @@ void VTexture::Bind(VRenderContext& io_rContext, unsigned int i_Unit, const VTex
 	set(GL_TEXTURE_MAG_FILTER, i_rSampling.m_bMagnificationLinear ? GL_LINEAR : GL_NEAREST);
 	set(GL_TEXTURE_WRAP_S, i_rSampling.m_bClampS ? GL_CLAMP_TO_EDGE : GL_REPEAT);
 	set(GL_TEXTURE_WRAP_T, i_rSampling.m_bClampT ? GL_CLAMP_TO_EDGE : GL_REPEAT);
-	if (i_rSampling.m_Anisotropy > 1.0f && io_rContext.m_pContext->hasExtension("GL_EXT_texture_filter_anisotropic"))
-	{
-		float most = 1.0f;
-		rGL.glGetFloatv(GL_MAX_TEXTURE_MAX_ANISOTROPY_EXT, &most);
-		rGL.glTexParameterf(GL_TEXTURE_2D, GL_TEXTURE_MAX_ANISOTROPY_EXT, std::min(i_rSampling.m_Anisotropy, most));
-	}
+	if (io_rContext.m_MostAnisotropy > 1.0f)
+		rGL.glTexParameterf(GL_TEXTURE_2D, GL_TEXTURE_MAX_ANISOTROPY_EXT,
+		    std::clamp(i_rSampling.m_Anisotropy, 1.0f, io_rContext.m_MostAnisotropy));
 }
 
 } // namespace CoreGraphics

@@ -14,8 +14,6 @@
 #include <QPainter>
 #include <QTime>
 
-#include <cstring>
-
 namespace OrlexGraphics
 {
 
@@ -36,17 +34,6 @@ void VFrameRenderer::Initialise()
 	m_Context.Initialise();
 }
 
-bool VFrameRenderer::IsSoftware() const
-{
-	const auto* const pName = reinterpret_cast<const char*>(m_Context.m_pFunctions->glGetString(GL_RENDERER));
-	if (!pName)
-		return false;
-	for (const char* const pSoftware : {"llvmpipe", "softpipe", "swrast", "Software", "SWR", "GDI Generic", "WARP"})
-		if (std::strstr(pName, pSoftware))
-			return true;
-	return false;
-}
-
 void VFrameRenderer::SetScene(std::shared_ptr<VOrlexScene> i_pScene)
 {
 	m_pScene = std::move(i_pScene);
@@ -62,6 +49,7 @@ void VFrameRenderer::SetSize(const QSize& i_rSize)
 {
 	m_Size = i_rSize;
 	m_pIdFramebuffer = std::make_unique<QOpenGLFramebufferObject>(i_rSize, QOpenGLFramebufferObject::Depth);
+	m_pPickFramebuffer.reset();
 	m_pOutlineFramebuffer = std::make_unique<QOpenGLFramebufferObject>(i_rSize, GL_TEXTURE_2D);
 }
 

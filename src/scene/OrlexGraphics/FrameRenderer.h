@@ -48,7 +48,7 @@ public:
 	void Initialise();
 	bool IsInitialised() const { return m_Context.m_pContext != nullptr; }
 	/// Whether the processor draws.
-	bool IsSoftware() const;
+	bool IsSoftware() const { return m_Context.m_bSoftware; }
 
 	/// Makes the scene ready for this context. While the user interface thread waits.
 	void SetScene(std::shared_ptr<VOrlexScene> i_pScene);

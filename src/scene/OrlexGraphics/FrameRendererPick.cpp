@@ -17,7 +17,8 @@ namespace OrlexGraphics
 namespace
 {
 
-/// Room for the largest item. Only the rectangle that is picked from is ever cleared, drawn and read.
+/// The most that is picked from. Only the rectangle of the pick is ever cleared, drawn and read, but all of it takes
+/// memory: it is made with the first pick, no larger than the item.
 constexpr QSize c_PickSize(4096, 4096);
 
 /// Things that lie behind each other are found by drawing again without what was found.
@@ -29,7 +30,8 @@ constexpr double c_RectangleScale = 0.5;
 void VFrameRenderer::Pick(const VPickRequest& i_rRequest, VPick& o_rPick)
 {
 	if (!m_pPickFramebuffer)
-		m_pPickFramebuffer = std::make_unique<QOpenGLFramebufferObject>(c_PickSize, QOpenGLFramebufferObject::Depth);
+		m_pPickFramebuffer =
+		    std::make_unique<QOpenGLFramebufferObject>(m_Size.boundedTo(c_PickSize), QOpenGLFramebufferObject::Depth);
 	BeginFrame();
 	m_Context.m_Mode = CoreGraphics::ERenderPick;
 	m_Context.BindFramebuffer(m_pPickFramebuffer.get());
