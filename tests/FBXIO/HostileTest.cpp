@@ -117,6 +117,13 @@ const VHostileRow c_Rows[]{
     {"PolygonCountOf2To31AsText",
         [] { return With("PolygonVertexIndex", VRaw{"*2147483648 {\n a: 0,1,-3\n}"}, c_SmallFiles[4]); },
         {false, 2, 1, 1, "the numbers of an array are missing"}},
+    {"ThirtyMillionPolygons",
+	    []
+	    {
+		    return With("PolygonVertexIndex",
+		        PackedArray('i', 30'000'000, true, std::string(120'000'000, '\xff')));
+	    },
+	    {true, 2, 0, 0, "Mesh bodyShape left out because it has too many polygons"}},
     {"HugeAndNegativeVertices",
         [] {
 	        return With("PolygonVertexIndex", VIntegers{0, 0x7fffffff, -3, 0, 1, -0x7fffffff - 1, 0, 1, -3});

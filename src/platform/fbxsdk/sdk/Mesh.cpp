@@ -109,6 +109,15 @@ void fbxsdk::FbxMesh::CutPolygons() const
 	const int points = int(m_Points.size() / 3);
 	const auto polygons = std::size_t(
 	    std::count_if(m_PolygonVertices.begin(), m_PolygonVertices.end(), [](int i_Vertex) { return i_Vertex < 0; }));
+	// Their places are larger than what the file has of them.
+	if (!m_Record.m_pBudget->Take(polygons * 2 * sizeof(int)))
+	{
+		NVX_LOG("FBXIO", NVX::ELogWarning, "Mesh %1% left out because it has too many polygons", GetName());
+		m_bSound = false;
+		m_Points = {};
+		m_PolygonVertices = {};
+		return;
+	}
 	m_PolygonStarts.reserve(polygons);
 	m_PolygonSizes.reserve(polygons);
 	int start = 0;
