@@ -134,8 +134,8 @@ QWidget* VPreferencesDialog::NavigationPage()
 	auto* const pLayout = new QGridLayout(pPage);
 	m_pNavigationAlt =
 	    Named(new QComboBox, TesselPluginInterface::c_NavigationAltKey, tr("The mouse moves the camera"));
-	m_pNavigationAlt->addItem(tr("while Alt is held"), 1);
-	m_pNavigationAlt->addItem(tr("while Alt is not held"), 0);
+	m_pNavigationAlt->addItem(tr("while Alt is not held"), 1);
+	m_pNavigationAlt->addItem(tr("while Alt is held"), 0);
 	m_pNavigationAlt->setCurrentIndex(
 	    m_pNavigationAlt->findData(m_rPreferences.Number(TesselPluginInterface::c_NavigationAltKey, 1) ? 1 : 0));
 	pLayout->addWidget(new QLabel(tr("The mouse moves the camera")), 0, 0);
