@@ -3,13 +3,17 @@
 #include <gtest/gtest.h>
 
 #include <QApplication>
+#include <QComboBox>
 #include <QFileDialog>
 #include <QLineEdit>
 #include <QQuickItem>
 #include <QQuickWidget>
 #include <QQuickWindow>
 #include <QScreen>
+#include <QTabBar>
+#include <QTabWidget>
 #include <QTest>
+#include <QTimer>
 #include <QWheelEvent>
 #include <QWindow>
 
@@ -51,6 +55,12 @@ QQuickItem* VOperator::Item(const QString& i_rName) const
 		pItem = Find(pTop, i_rName, false);
 	EXPECT_TRUE(pItem) << i_rName.toStdString();
 	return pItem;
+}
+
+bool VOperator::Shows(const QString& i_rName, const QString& i_rText) const
+{
+	const QQuickItem* const pItem = Find(Top(m_rPanel.rootObject()), i_rName, true);
+	return pItem && pItem->property("text").toString() == i_rText;
 }
 
 QVariant VOperator::Property(const QString& i_rName, const char* i_pProperty) const
@@ -157,6 +167,37 @@ void VOperator::Wheel(int i_Notches)
 	QTest::qWait(0);
 }
 
+void VOperator::ChooseInNextDialog(
+    const char* i_pDialog, const char* i_pBox, const QString& i_rEntry, const char* i_pButton)
+{
+	auto* const pTimer = new QTimer(&m_rWindow);
+	QObject::connect(pTimer, &QTimer::timeout, pTimer,
+	    [=]
+	    {
+		    QWidget* const pDialog = QApplication::activeModalWidget();
+		    if (!pDialog || !pDialog->windowHandle() || !pDialog->windowHandle()->isExposed())
+			    return;
+		    pTimer->deleteLater();
+		    pTimer->stop();
+		    ASSERT_EQ(pDialog->objectName(), i_pDialog);
+		    const auto click = [=](const QWidget& i_rWidget, const QPoint& i_rPlace)
+		    { QTest::mouseClick(pDialog->windowHandle(), Qt::LeftButton, {}, i_rWidget.mapTo(pDialog, i_rPlace)); };
+		    auto* const pBox = pDialog->findChild<QComboBox*>(i_pBox);
+		    const auto* const pPages = pDialog->findChild<QTabWidget*>();
+		    for (int page = 0; !pBox->isVisible() && page < pPages->count(); ++page)
+			    click(*pPages->tabBar(), pPages->tabBar()->tabRect(page).center());
+		    click(*pBox, pBox->rect().center());
+		    ASSERT_TRUE(Eventually([] { return QApplication::activePopupWidget() != nullptr; }));
+		    for (const Qt::Key key : {Qt::Key_Home, Qt::Key_Down, Qt::Key_Return})
+			    if (key != Qt::Key_Down || i_rEntry != pBox->itemText(0))
+				    QTest::keyClick(QApplication::activePopupWidget()->windowHandle(), key);
+		    EXPECT_EVENTUALLY(pBox->currentText() == i_rEntry);
+		    const auto* const pButton = pDialog->findChild<QWidget*>(i_pButton);
+		    click(*pButton, pButton->rect().center());
+	    });
+	pTimer->start(10);
+}
+
 QImage VOperator::See(const QPointF& i_rPlace, int i_Reach) const
 {
 	const QPoint corner = InWindow(i_rPlace) - QPoint(i_Reach, i_Reach);
@@ -252,7 +293,7 @@ bool VOperator::DismissDialog()
 
 bool VOperator::ComeBack()
 {
-	if (!Eventually([this] { return !Dialog(); }))
+	if (!Eventually([] { return !QApplication::activeModalWidget(); }))
 		return false;
 	// Where no window manager does it.
 	m_rWindow.activateWindow();

@@ -23,6 +23,8 @@ public:
 
 	/// Of the panel, by objectName, visible ones first; null with a test failure if there is none.
 	QQuickItem* Item(const QString& i_rName) const;
+	/// A visible item of the panel has this text.
+	bool Shows(const QString& i_rName, const QString& i_rText) const;
 	QVariant Property(const QString& i_rName, const char* i_pProperty) const;
 
 	/// The mouse, in the middle of an item.
@@ -39,6 +41,9 @@ public:
 	    Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
 	/// Notches of the wheel, away from the user.
 	void Wheel(int i_Notches);
+	/// In a box of a dialog that keeps the keyboard until it is answered, as soon as it opens: picks the entry with
+	/// this text, then the dialog's button.
+	void ChooseInNextDialog(const char* i_pDialog, const char* i_pBox, const QString& i_rEntry, const char* i_pButton);
 	/// What stands on the screen around a place of the preview.
 	QImage See(const QPointF& i_rPlace, int i_Reach) const;
 

@@ -4,6 +4,8 @@
 #include "Eye.h"
 #include "WindowFixture.h"
 
+#include "studio/Services.h"
+
 #include <QFile>
 #include <QRegularExpression>
 
@@ -28,14 +30,18 @@ protected:
 
 	QString ToolTip() const { return m_pOperator->Property("scene", "toolTipText").toString(); }
 
+	/// Of a bone on the screen.
+	QPointF Middle(const char* i_pName, const char* i_pEnd) const
+	{
+		const VSkeleton& rSkeleton = m_Source.count(i_pName) != 0 ? m_Source : m_Target;
+		return m_Eye.Project(0.5 * (rSkeleton.at(i_pName).translation() + rSkeleton.at(i_pEnd).translation()));
+	}
+
 	/// Points at the middle of a bone, and sees its name.
 	QPointF PointAtBone(const char* i_pName, const char* i_pEnd)
 	{
-		const bool bSource = m_Source.count(i_pName) != 0;
-		const VSkeleton& rSkeleton = bSource ? m_Source : m_Target;
-		const QPointF place =
-		    m_Eye.Project(0.5 * (rSkeleton.at(i_pName).translation() + rSkeleton.at(i_pEnd).translation()));
-		m_pOperator->Point({m_Eye.m_Size.width() - 3.0, 3.0});
+		const QPointF place = Middle(i_pName, i_pEnd);
+		m_pOperator->Point(Nowhere());
 		EXPECT_EVENTUALLY(ToolTip().isEmpty()) << ToolTip().toStdString();
 		m_pOperator->Point(place);
 		const QString name = QString("Template : ") + i_pName;
@@ -43,6 +49,17 @@ protected:
 		return place;
 	}
 
+	/// Above the floor's horizon.
+	QPointF Nowhere() const { return {m_Eye.m_Size.width() - 3.0, 3.0}; }
+	/// Names of the segments, in the order in which they were selected.
+	QStringList Selected() const
+	{
+		QStringList names;
+		for (const NVX::ISelectionItem& rItem : m_pWindow->Context().GetSelectionManager()->Selection().Items())
+			names << Names(rItem.m_Kind == NVX::ESelectionSourceSegment ? "sourceSegments" : "targetSegments")
+			             .value(int(rItem.m_ElementIndex));
+		return names;
+	}
 	bool Selected(const char* i_pList, const char* i_pSegment) const
 	{
 		return m_pOperator->Property(i_pList, "selectedIndex").toInt() == RowOf(i_pList, i_pSegment);
@@ -93,14 +110,22 @@ protected:
 	{
 		return i_rColour.red() > 120 && i_rColour.green() > 120 && i_rColour.blue() < 60;
 	}
+	static bool IsOrange(const QColor& i_rColour)
+	{
+		return i_rColour.red() > 150 && i_rColour.green() < 120 && i_rColour.blue() < 60;
+	}
+	static bool IsWhite(const QColor& i_rColour)
+	{
+		return i_rColour.red() > 220 && i_rColour.green() > 220 && i_rColour.blue() > 220;
+	}
 	static bool IsMagenta(const QColor& i_rColour)
 	{
 		return i_rColour.red() > 90 && i_rColour.green() < 60 && i_rColour.blue() > 90;
 	}
-	/// On the screen, a pixel or two beside a place.
-	bool Sees(const QPointF& i_rPlace, bool (*i_pIsColour)(const QColor&)) const
+	/// On the screen, some pixels beside a place.
+	bool Sees(const QPointF& i_rPlace, bool (*i_pIsColour)(const QColor&), int i_Reach = 2) const
 	{
-		const QImage image = m_pOperator->See(i_rPlace, 2);
+		const QImage image = m_pOperator->See(i_rPlace, i_Reach);
 		for (int y = 0; y < image.height(); ++y)
 			for (int x = 0; x < image.width(); ++x)
 				if (i_pIsColour(image.pixelColor(x, y)))
@@ -219,6 +244,103 @@ TEST_F(Preview, TheMainRoad)
 	m_Target = ReadSkeleton(Run({"fk", File("posed.qrr")}));
 	PointAtBone("foreArmRight", "palmRight");
 	PointAtBone("foreArmLeft", "palmLeft");
+}
+
+TEST_F(Preview, PicksWhatTheMouseIsOn)
+{
+	m_pOperator->ClickAt(PointAtBone("upperArmLeft", "foreArmLeft"));
+	EXPECT_EVENTUALLY(Selected("targetSegments", "upperArmLeft"));
+	for (const int axis : {0, 1})
+	{
+		const QPointF place = OnRing(m_Target.at("upperArmLeft"), axis, 0.7);
+		m_pOperator->Point(place);
+		EXPECT_EVENTUALLY(Sees(place, IsYellow)) << axis;
+	}
+}
+
+TEST_F(Preview, SelectsLikeTheLists)
+{
+	VOperator& rOperator = *m_pOperator;
+	rOperator.Drag({Qt::LeftButton, Qt::RightButton}, QPoint(300, 400), QPoint(300, 490));
+	m_Eye.Pan({0, 90});
+	rOperator.Wheel(10);
+	m_Eye.m_Distance *= std::pow(0.9, 10);
+	using VBone = std::pair<const char*, const char*>;
+	const VBone left{"L_Radius", "L_Hand"}, right{"R_Radius", "R_Hand"}, target{"foreArmRight", "palmRight"}, nothing{};
+	struct VRow
+	{
+		const char* m_pName;
+		VBone m_Bone;
+		Qt::KeyboardModifiers m_Modifiers;
+		QStringList m_Selected;
+	};
+	const VRow rows[] = {
+	    {"a click selects", right, Qt::NoModifier, {"R_Radius"}},
+	    {"and replaces", left, Qt::NoModifier, {"L_Radius"}},
+	    {"all kinds", target, Qt::NoModifier, {"foreArmRight"}},
+	    {"Shift adds", right, Qt::ShiftModifier, {"foreArmRight", "R_Radius"}},
+	    {"once", right, Qt::ShiftModifier, {"foreArmRight", "R_Radius"}},
+	    {"Ctrl adds", left, Qt::ControlModifier, {"foreArmRight", "R_Radius", "L_Radius"}},
+	    {"Ctrl takes away", right, Qt::ControlModifier, {"foreArmRight", "L_Radius"}},
+	    {"both take away", left, Qt::ControlModifier | Qt::ShiftModifier, {"foreArmRight"}},
+	    {"nothing is added", nothing, Qt::ShiftModifier, {"foreArmRight"}},
+	    {"nothing is left", nothing, Qt::NoModifier, {}},
+	    {"Alt selects, too", right, Qt::AltModifier, {"R_Radius"}},
+	};
+	for (const VRow& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		rOperator.ClickAt(
+		    rRow.m_Bone.first ? PointAtBone(rRow.m_Bone.first, rRow.m_Bone.second) : Nowhere(), rRow.m_Modifiers);
+		for (int i = 0; i < 3 && Selected() == rRow.m_Selected; ++i)
+			rOperator.WaitForDrawing();
+		EXPECT_EVENTUALLY(Selected() == rRow.m_Selected) << Selected().join(' ').toStdString();
+	}
+
+	// What is pointed at in a list shines in the view, and the other way round.
+	const QPointF place = PointAtBone(target.first, target.second);
+	EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", ToolTip()));
+	const QString row = "targetSegmentsRow" + QString::number(RowOf("targetSegments", target.first));
+	const QVariant marked = rOperator.Property(row, "color");
+	rOperator.Point(Nowhere());
+	EXPECT_EVENTUALLY(rOperator.Property(row, "color") != marked);
+	EXPECT_EVENTUALLY(!Sees(place, IsWhite, 12));
+	rOperator.Hover(row);
+	EXPECT_EVENTUALLY(rOperator.Property(row, "color") == marked);
+	EXPECT_EVENTUALLY(Sees(place, IsWhite, 12));
+
+	// Rectangles, with the one preference and the other.
+	const QRect shins = QRectF(Middle("R_Tibia", "R_Foot"), Middle("shinRight", "hockRight"))
+	                        .normalized()
+	                        .adjusted(-8, -8, 8, 8)
+	                        .toRect();
+	for (const Qt::KeyboardModifiers modifiers : {Qt::KeyboardModifiers(Qt::AltModifier), Qt::KeyboardModifiers()})
+	{
+		rOperator.Press(Qt::LeftButton, shins.topLeft(), modifiers);
+		rOperator.Point(shins.center(), modifiers);
+		rOperator.Point(shins.bottomRight(), modifiers);
+		EXPECT_EVENTUALLY(ToolTip() == "Template : R_Tibia<br>Template : shinRight") << ToolTip().toStdString();
+		EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "Template : R_Tibia\nTemplate : shinRight"));
+		EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
+		rOperator.Release(Qt::LeftButton, shins.bottomRight(), modifiers);
+		EXPECT_EVENTUALLY(
+		    Selected() == QStringList({"R_Tibia", "shinRight"}) || Selected() == QStringList({"shinRight", "R_Tibia"}))
+		    << Selected().join(' ').toStdString();
+
+		// A drag that moves the camera selects nothing.
+		rOperator.Drag(
+		    {Qt::LeftButton}, Nowhere().toPoint(), Nowhere().toPoint() - QPoint(40, -20), modifiers ^ Qt::AltModifier);
+		m_Eye.Orbit({-40, 20});
+		PointAtBone(target.first, target.second);
+		rOperator.Drag(
+		    {Qt::LeftButton}, Nowhere().toPoint(), Nowhere().toPoint() - QPoint(-40, 20), modifiers ^ Qt::AltModifier);
+		m_Eye.Orbit({40, -20});
+		EXPECT_EQ(Selected().size(), 2);
+		if (!modifiers)
+			break;
+		rOperator.ChooseInNextDialog("Preferences", "NavigationAlt", "while Alt is held", "PreferencesOk");
+		rOperator.Key(Qt::Key_Comma, Qt::ControlModifier);
+	}
 }
 
 } // namespace

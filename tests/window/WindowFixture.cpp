@@ -89,13 +89,19 @@ void Window::CreateTargetSubject()
 	EXPECT_EVENTUALLY(m_pOperator->Property("targetSegments", "count").toInt() > 20);
 }
 
-int Window::RowOf(const char* i_pList, const char* i_pName) const
+QStringList Window::Names(const char* i_pList) const
 {
+	QStringList names;
 	QObject* const pModel = m_pOperator->Property(i_pList, "model").value<QObject*>();
 	const auto* const pItems = qobject_cast<QAbstractItemModel*>(pModel);
 	for (int row = 0; pItems && row < pItems->rowCount(); ++row)
-		if (pItems->data(pItems->index(row, 0), Qt::UserRole + 1).toString() == i_pName)
-			return row;
-	ADD_FAILURE() << i_pName;
-	return 0;
+		names << pItems->data(pItems->index(row, 0), Qt::UserRole + 1).toString();
+	return names;
+}
+
+int Window::RowOf(const char* i_pList, const char* i_pName) const
+{
+	const int row = Names(i_pList).indexOf(i_pName);
+	EXPECT_NE(row, -1) << i_pName;
+	return row;
 }

@@ -27,6 +27,8 @@ protected:
 
 	/// Chooses the demo's files and creates the target subject.
 	void CreateTargetSubject();
+	/// Of the rows of a list.
+	QStringList Names(const char* i_pList) const;
 	int RowOf(const char* i_pList, const char* i_pName) const;
 	int Targets() const { return m_pOperator->Property("targets", "count").toInt(); }
 

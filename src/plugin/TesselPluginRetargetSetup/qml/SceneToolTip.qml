@@ -8,7 +8,6 @@ ToolTip {
 
 	property var scene: null
 
-	objectName: "sceneToolTip"
 	// Names come from files: they stay plain text, and only what parts them becomes a line.
 	text: scene ? scene.toolTipText.replace(/<br>/g, "\n") : ""
 	x: scene ? scene.mousePos.x + 10 : 0
@@ -17,6 +16,7 @@ ToolTip {
 	delay: Theme.infoToolTipDelay
 
 	contentItem: Text {
+		objectName: "sceneToolTip"
 		text: toolTip.text
 		textFormat: Text.PlainText
 		color: "white"
