@@ -1,10 +1,13 @@
 #include "fbxsdk/container/Arrays.h"
 #include "fbxsdk/container/FileKind.h"
+#include "fbxsdk/scene/ArraySource.h"
 
 #include "FbxFileBuilder.h"
+#include "TestLog.h"
 
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <numeric>
 
 using namespace FbxFormat;
@@ -127,6 +130,47 @@ TEST(Arrays, OfTextMustHoldTheirCount)
 		VArrayNumbers<double> numbers;
 		EXPECT_FALSE(ReadArray(tree, 1, budget, numbers)) << pText;
 	}
+}
+
+/// Enough for two threads: the same as one after another, whichever is faster.
+TEST(Arrays, TogetherAreReadAsOneByOne)
+{
+	std::vector<VTestRecord> records;
+	for (int i = 0; i < 40; ++i)
+	{
+		VNumbers numbers(2000);
+		for (std::size_t k = 0; k < numbers.size(); ++k)
+			numbers[k] = std::sin(double(k * (i + 1)));
+		VRaw raw = PackedArray('d', 2000, true, {reinterpret_cast<const char*>(numbers.data()), 16'000});
+		if (i % 7 == 3)
+			raw.m_Bytes.back() ^= 1;
+		records.push_back({"A" + std::to_string(i), {raw}, {}});
+	}
+	const std::string bytes = Write(c_Forms[1], records);
+	VElementTree tree;
+	ASSERT_TRUE(tree.Read(bytes, DetectFileKind(bytes)));
+	// The last two are beyond the budget.
+	VDecodeBudget budget{38 * 16'000};
+	VDecodeBudget other = budget;
+	std::vector<VArrayNumbers<double>> numbers(records.size());
+	std::vector<VDecodeJob> jobs;
+	for (std::size_t i = 0; i < records.size(); ++i)
+		jobs.push_back({{&tree, &budget, VElementIndex(i + 1)}, "owner", &numbers[i]});
+	VTestLog log;
+	Decode(jobs);
+	VMessages messages;
+	for (std::size_t i = 0; i < records.size(); ++i)
+	{
+		VArrayNumbers<double> expected;
+		EXPECT_EQ(jobs[i].m_bSound, ReadArray(tree, VElementIndex(i + 1), other, expected)) << i;
+		EXPECT_EQ(jobs[i].m_bSound, i % 7 != 3 && i < 38) << i;
+		EXPECT_EQ(numbers[i], expected) << i;
+		if (!jobs[i].m_bSound)
+			messages.emplace_back(
+			    3, "Array " + records[i].m_Name + " of owner left out because it is damaged or too large");
+	}
+	EXPECT_EQ(log.m_Messages, messages);
+	EXPECT_EQ(budget.m_BytesLeft, 0u);
 }
 
 } // namespace
