@@ -21,7 +21,7 @@ VArrayNumbers<std::int32_t> PlacesOf(
 	if (layer.m_Element == c_NoElement)
 		return {};
 	VArrayNumbers<std::int32_t> places;
-	(void)Decode({layer.Child(i_pPlaces), i_pNode, &places});
+	(void)FbxFormat::Decode({layer.Child(i_pPlaces), i_pNode, &places});
 	const VElementIndex mapping = layer.Child("MappingInformationType").m_Element;
 	const std::string_view mode =
 	    mapping == c_NoElement ? std::string_view() : ValueAt(*i_rMesh.m_pTree, mapping, 0).m_Text;
