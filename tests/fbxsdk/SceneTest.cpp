@@ -139,22 +139,23 @@ TEST(Scene, BrokenConnectionsAreLeftOutAndTold)
 
 TEST(Scene, ChainOfFiftyThousandNodes)
 {
-	VTestScene scene;
 	constexpr int c_Count = 50'000;
-	for (int i = 0; i < c_Count; ++i)
-		scene.m_Nodes.push_back({std::to_string(i), "LimbNode", i - 1, {{"Lcl Translation", {1, 0, 0}}}});
-	// Objects by name, and by number.
-	for (const VTestForm& rForm : {c_Forms[3], c_Forms[1]})
+	std::string nodes, connections;
+	for (int i = 1; i <= c_Count; ++i)
 	{
-		VImported file(Write(rForm, scene));
-		ASSERT_TRUE(file.m_bImported);
-		EXPECT_EQ(file.Root()->GetChildCount(true), c_Count);
-		FbxNode* pLast = file.Root();
-		while (pLast->GetChildCount() > 0)
-			pLast = pLast->GetChild(0);
-		// From the far end, so that all of them are open at once.
-		EXPECT_EQ(pLast->EvaluateGlobalTransform().Get(3, 0), c_Count);
+		const std::string number = std::to_string(i);
+		nodes.append("Model: ").append(number).append(",\"\",\"\" {\nProperties70: {\n");
+		nodes.append("P: \"Lcl Translation\",\"\",\"\",\"\",1,0,0\n}\n}\n");
+		connections.append("C: \"OO\",").append(number).append(",").append(std::to_string(i - 1)).append("\n");
 	}
+	VImported file("; FBX 7.4.0\nObjects: {\n" + nodes + "}\nConnections: {\n" + connections + "}\n");
+	ASSERT_TRUE(file.m_bImported);
+	EXPECT_EQ(file.Root()->GetChildCount(true), c_Count);
+	FbxNode* pLast = file.Root();
+	while (pLast->GetChildCount() > 0)
+		pLast = pLast->GetChild(0);
+	// From the far end, so that all of them are open at once.
+	EXPECT_EQ(pLast->EvaluateGlobalTransform().Get(3, 0), c_Count);
 }
 
 TEST(Scene, ImporterRefusesWhatItCannotDo)
