@@ -1,7 +1,7 @@
 #include "PicturesFixture.h"
 
-#include "../FBXIO/MeshFile.h"
 #include "../Allocations.h"
+#include "../FBXIO/MeshFile.h"
 #include "../OrlexGraphics/HeldJobs.h"
 #include "CoreGraphics/RenderContext.h"
 #include "DebugServices/GlobalLog.h"
@@ -69,23 +69,31 @@ protected:
 		Options().m_LabellingSubject.m_bEnabled = false;
 		OrlexGraphics::VSubjectOptions& rOptions = Options().m_SolvingSubject;
 		rOptions.m_bMarkers = rOptions.m_bSticks = rOptions.m_bMissingMarkers = rOptions.m_bBones = false;
-		WriteSkin("Boxes", {1, 0, 0});
+		WriteBoxes({1, 0, 0});
 	}
 	void TearDown() override { m_pSkinCache->Dispose(); }
 
+	static void AddNode(
+	    VTestScene& io_rScene, const char* i_pName, const char* i_pKind, int i_Parent, const VNumbers& i_rPlace)
+	{
+		io_rScene.m_Nodes.push_back({i_pName, i_pKind, i_Parent, {{"Lcl Translation", i_rPlace}}});
+	}
+	void WriteFile(const char* i_pName, VTestScene& io_rScene, const std::vector<VTestMesh>& i_rMeshes)
+	{
+		io_rScene.m_Settings = {{"UnitScaleFactor", {0.1}}};
+		std::ofstream(m_Folder.filePath(QString(i_pName) + ".fbx").toStdString(), std::ios::binary)
+		    << Write(c_Forms[1], io_rScene, i_rMeshes);
+	}
+
 	/// Three boxes in the proportions of the subject: one colour, half transparent, and with a texture.
-	void WriteSkin(const char* i_pName, const VNumbers& i_rColour)
+	void WriteBoxes(const VNumbers& i_rColour)
 	{
 		VTestScene scene;
-		scene.m_Settings = {{"UnitScaleFactor", {0.1}}};
-		const auto add = [&scene](const char* i_pNode, const char* i_pKind, int i_Parent, const VNumbers& i_rPlace) {
-			scene.m_Nodes.push_back({i_pNode, i_pKind, i_Parent, {{"Lcl Translation", i_rPlace}}});
-		};
-		add("Ns:Root", "LimbNode", -1, {0, 0, 0});
-		add("Ns:Spine", "LimbNode", 0, {0, 0, 100});
-		add("Ns:Limb", "LimbNode", 1, {300, 0, 0});
+		AddNode(scene, "Ns:Root", "LimbNode", -1, {0, 0, 0});
+		AddNode(scene, "Ns:Spine", "LimbNode", 0, {0, 0, 100});
+		AddNode(scene, "Ns:Limb", "LimbNode", 1, {300, 0, 0});
 		for (const char* const pMesh : {"plain", "glass", "texture"})
-			add(pMesh, "Mesh", -1, {0, 0, 0});
+			AddNode(scene, pMesh, "Mesh", -1, {0, 0, 0});
 		QImage image(2, 2, QImage::Format_RGB32);
 		image.setPixel(0, 0, 0xff0000ff);
 		image.setPixel(1, 0, 0xffffffff);
@@ -98,8 +106,8 @@ protected:
 		    {{"DiffuseColor", {0, 0.5, 1}}, {"TransparentColor", {1, 1, 1}}, {"TransparencyFactor", {0.5}}}, "", ""};
 		const VTestMaterial texture{
 		    "phong", {{"TransparentColor", {1, 1, 1}}, {"TransparencyFactor", {0}}}, "texture.png", "texture.png"};
-		std::ofstream(m_Folder.filePath(QString(i_pName) + ".fbx").toStdString(), std::ios::binary) << Write(c_Forms[1],
-		    scene, {Box(3, 0, {0, 0, 0}, plain), Box(4, 1, {0, 0, 100}, glass), Box(5, 2, {300, 0, 100}, texture)});
+		WriteFile("Boxes", scene,
+		    {Box(3, 0, {0, 0, 0}, plain), Box(4, 1, {0, 0, 100}, glass), Box(5, 2, {300, 0, 100}, texture)});
 	}
 
 	void Show(const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr,
@@ -107,6 +115,7 @@ protected:
 	{
 		CoreOrlexTypes::VSubjectApplicationData data = TestSubject::MakeData();
 		data.m_Skin = "Boxes";
+		data.m_Targets[TestSubject::EBody].m_Colour = {0, 255, 0, 255};
 		data.m_SkinColourA = data.m_SkinColourB = i_rTint;
 		auto items = std::vector{Item("FlowSubjectForSolving", TestSubject::Make()),
 		    Item("FlowSubjectApplicationDataForSolving", std::move(data)),
@@ -164,6 +173,22 @@ TEST_P(SkinPictures, OfMaterialsOpaqueAndAsXRay)
 	Compare(Draw(c_View), "skin-health");
 }
 
+TEST_P(SkinPictures, OfTheClustersOfASubject)
+{
+	Show();
+	Wear();
+	const QImage without = Draw(c_View);
+	VTestScene scene;
+	AddNode(scene, "beacon", "LimbNode", -1, {0, 0, 0});
+	AddNode(scene, "mesh", "Mesh", -1, {0, 0, 0});
+	WriteFile("OrlexBeacon", scene, {Box(1, 0, {0, 0, 0}, {"phong", {}, "", ""})});
+	m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {});
+	Wear();
+	Compare(Draw(c_View), "skin-cluster");
+	Options().m_SolvingSubject.m_bClusters = false;
+	EXPECT_EQ(Draw(c_View), without);
+}
+
 TEST_P(SkinPictures, OfAFileAsItStands)
 {
 	m_pScene->LoadFBXScene(m_Folder.filePath("Boxes.fbx"));
@@ -183,7 +208,7 @@ TEST_P(SkinPictures, ChangeWithTheFileAndNotBeforeItIsRead)
 	Show();
 	Wear();
 	const QImage red = Draw(c_View);
-	WriteSkin("Boxes", {0, 1, 0});
+	WriteBoxes({0, 1, 0});
 	m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {"/", m_Folder.path().toStdString()});
 	m_pDispatcher->RunPending();
 	EXPECT_EQ(Draw(c_View), red) << "worn until the new one is there";

@@ -1,5 +1,6 @@
 #include "OrlexGraphics/SkinCache.h"
 
+#include "../FBXIO/MeshFile.h"
 #include "CoreGraphics/Skin.h"
 #include "DebugServices/GlobalLog.h"
 #include "HeldJobs.h"
@@ -192,9 +193,57 @@ TEST_F(SkinCache, TellsWhyThereIsNoSkin)
 	EXPECT_EQ(TakeLog(), "The skin Villain is not shown: there are no folders of skins\n");
 }
 
+/// A chain of bones, the last of which moves a triangle.
+std::string Chain(int i_Bones, bool i_bSkin)
+{
+	FbxTest::VTestScene scene;
+	for (int i = 0; i < i_Bones; ++i)
+		scene.m_Nodes.push_back({"bone" + std::to_string(i), "LimbNode", i - 1, {}});
+	scene.m_Nodes.push_back({"body", "Mesh", -1, {}});
+	FbxTest::VTestMesh mesh;
+	mesh.m_Node = i_Bones;
+	mesh.m_Points = {0, 0, 0, 1, 0, 0, 0, 1, 0};
+	mesh.m_Polygons = {0, 1, -3};
+	if (i_bSkin)
+		mesh.m_Clusters = {{i_Bones - 1, {0, 1, 2}, {1, 1, 1}, {}, {}}};
+	return FbxTest::Write(FbxTest::c_Forms[4], scene, {mesh});
+}
+
+TEST_F(SkinCache, TellsWhatOfASkinIsNotToBeSeen)
+{
+	SetFolders({m_Root / "a"});
+	const std::string whole = Chain(250, true);
+	const struct
+	{
+		const char* m_pName;
+		std::string m_Content;
+		std::string m_Message;
+	} c_Rows[] = {{"most", whole, ""},
+	    {"more", Chain(251, true),
+	        "The skin more has 251 bones: 250 are shown, what the others move goes with a bone that is not its own\n"},
+	    {"bare", Chain(3, false),
+	        "The skin bare is not shown: no mesh in " + (m_Root / "a/bare.fbx").string() + " is bound to bones\n"},
+	    {"cut", whole.substr(0, whole.rfind('}')),
+	        "The skin cut is shown in part: " + (m_Root / "a/cut.fbx").string() + " could not be read to its end\n"}};
+	for (const auto& rRow : c_Rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		std::ofstream((m_Root / "a" / rRow.m_pName).string() + ".fbx", std::ios::binary) << rRow.m_Content;
+		EXPECT_EQ(Load(rRow.m_pName), SkinStatus::c_Ready);
+		const std::string log = TakeLog();
+		const std::size_t own = log.find("The skin");
+		EXPECT_EQ(own == std::string::npos ? "" : log.substr(own), rRow.m_Message);
+	}
+}
+
 TEST_F(SkinCache, FollowsTheFolders)
 {
 	SetFolders({m_Root / "a"});
+	m_Changes = 0;
+	Write("a/NobodyWearsIt.fbx");
+	ASSERT_TRUE(WaitForChange());
+	m_pDelay->m_Callback();
+	EXPECT_EQ(m_Changes, 1);
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_NotFound);
 	m_Changes = 0;
 	WriteHero("a/Hero.fbx");

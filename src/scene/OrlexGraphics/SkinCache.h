@@ -71,7 +71,7 @@ public:
 	bool HasFolders(const std::string& i_rGroup);
 
 	/// A skin that is not there yet begins to be loaded; then ask again when ChangedSignal has fired, or before. Of
-	/// folders that have the file the last one counts. Any thread, but not of two threads at once.
+	/// folders that have the file the last one counts. Any thread.
 	/// @param o_rpSkin stays as it is unless the skin is ready
 	/// @return SkinStatus
 	std::uint32_t GetSkin(
