@@ -300,6 +300,12 @@ TEST_F(Preview, SelectsLikeTheLists)
 	// What is pointed at in a list shines in the view, and the other way round.
 	const QPointF place = PointAtBone(target.first, target.second);
 	EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", ToolTip()));
+	rOperator.Press(Qt::LeftButton, place);
+	rOperator.Point(place + QPointF(20.0, 0.0));
+	EXPECT_EQ(ToolTip(), "") << "the camera moves";
+	rOperator.Point(place);
+	rOperator.Release(Qt::LeftButton, place);
+	EXPECT_EVENTUALLY(!ToolTip().isEmpty());
 	const QString row = "targetSegmentsRow" + QString::number(RowOf("targetSegments", target.first));
 	const QVariant marked = rOperator.Property(row, "color");
 	rOperator.Point(Nowhere());
