@@ -139,22 +139,32 @@ protected:
 		return m_Target.at(i_pSegment).linear() * Exp(Pose(m_Created, i_pSegment)).transpose();
 	}
 
-	/// Of a segment's bind pose in a file.
-	static Eigen::Vector3d Pose(const QByteArray& i_rFile, const char* i_pSegment)
+	/// A segment's bind pose in a file, number by number as it stands there.
+	static QStringList Numbers(const QByteArray& i_rFile, const char* i_pSegment)
 	{
 		const QRegularExpression pattern(
-		    QString("NAME=\"%1\"[^>]*>\\s*<JointBall.*?BIND-POSE=\"(\\S+) (\\S+) (\\S+)\"").arg(i_pSegment),
+		    QString("NAME=\"%1\"[^>]*>\\s*<Joint.*?BIND-POSE=\"([^\"]*)\"").arg(i_pSegment),
 		    QRegularExpression::DotMatchesEverythingOption);
-		const QRegularExpressionMatch match = pattern.match(QString::fromUtf8(i_rFile));
-		EXPECT_TRUE(match.hasMatch()) << i_pSegment;
-		return {match.captured(1).toDouble(), match.captured(2).toDouble(), match.captured(3).toDouble()};
+		return pattern.match(QString::fromUtf8(i_rFile)).captured(1).split(' ');
 	}
-	static QString Text(const Eigen::Vector3d& i_rVector)
+	/// Three of them.
+	static Eigen::Vector3d Pose(const QByteArray& i_rFile, const char* i_pSegment, int i_First = 0)
 	{
-		return QString("%1,%2,%3")
-		    .arg(i_rVector.x(), 0, 'g', 17)
-		    .arg(i_rVector.y(), 0, 'g', 17)
-		    .arg(i_rVector.z(), 0, 'g', 17);
+		const QStringList numbers = Numbers(i_rFile, i_pSegment).mid(i_First);
+		EXPECT_GE(numbers.size(), 3) << i_pSegment;
+		return {numbers.value(0).toDouble(), numbers.value(1).toDouble(), numbers.value(2).toDouble()};
+	}
+	/// What gives a segment the pose that it has in a file.
+	static QStringList PoseEdit(const QByteArray& i_rFile, const char* i_pSegment)
+	{
+		return {"--pose", i_pSegment + ("=" + Numbers(i_rFile, i_pSegment).join(','))};
+	}
+	QByteArray SaveAs(const char* i_pName)
+	{
+		m_pOperator->Click("saveAs");
+		m_pOperator->AnswerDialog(File(i_pName));
+		EXPECT_EVENTUALLY(QFile::exists(File(i_pName)));
+		return Content(i_pName);
 	}
 
 	VEye m_Eye;
@@ -229,16 +239,12 @@ TEST_F(Preview, TheMainRoad)
 	}
 
 	rOperator.Click("updateTargets");
-	rOperator.Click("saveAs");
-	rOperator.AnswerDialog(File("posed.qrr"));
-	EXPECT_EVENTUALLY(QFile::exists(File("posed.qrr")));
-	const QByteArray saved = Content("posed.qrr");
+	const QByteArray saved = SaveAs("posed.qrr");
 	const Eigen::Vector3d pose = Pose(saved, "upperArmLeft");
 	const Eigen::Vector3d otherPose = Pose(saved, "upperArmRight");
 	EXPECT_LT((pose - Log(frame.transpose() * arm.linear())).norm(), 1e-6) << pose;
 	EXPECT_LT((otherPose - Log(otherFrame.transpose() * otherArm.linear())).norm(), 1e-6) << otherPose;
-	m_Edits +=
-	    {"--pose", "upperArmLeft=" + Text(pose), "--pose", "upperArmRight=" + Text(otherPose), "--update-targets"};
+	m_Edits += PoseEdit(saved, "upperArmLeft") + PoseEdit(saved, "upperArmRight") + QStringList("--update-targets");
 	EXPECT_TRUE(CommandLine(m_Edits) == saved);
 
 	m_Target = ReadSkeleton(Run({"fk", File("posed.qrr")}));
@@ -256,6 +262,33 @@ TEST_F(Preview, PicksWhatTheMouseIsOn)
 		m_pOperator->Point(place);
 		EXPECT_EVENTUALLY(Sees(place, IsYellow)) << axis;
 	}
+}
+
+TEST_F(Preview, TheRootMovesAlongAnArrow)
+{
+	m_pOperator->ClickRow("targetSegments", RowOf("targetSegments", "haunch"));
+	EXPECT_EVENTUALLY(Selected("targetSegments", "haunch"));
+	const Eigen::Vector3d root = m_Target.at("haunch").translation();
+	const Eigen::Vector3d axis = m_Target.at("haunch").linear().col(0);
+	const QPoint from = m_Eye.Project(root + 60.0 * m_Eye.PixelSize(root) * axis).toPoint();
+	const QPoint to = from + QPoint(50, 30);
+	m_pOperator->Point(from);
+	EXPECT_EVENTUALLY(Sees(from, IsYellow));
+	m_pOperator->Drag({Qt::LeftButton}, from, to);
+
+	// How far along the arrow the mouse is: where it comes nearest to it.
+	const auto along = [&](const QPointF& i_rMouse)
+	{
+		Eigen::Matrix<double, 3, 2> lines;
+		lines << axis, -m_Eye.Ray(i_rMouse);
+		return (lines.transpose() * lines).inverse().row(0).dot(lines.transpose() * (m_Eye.Place() - root));
+	};
+	const QByteArray saved = SaveAs("moved.qrr");
+	const Eigen::Vector3d moved = Pose(saved, "haunch", 3) - Pose(m_Created, "haunch", 3);
+	EXPECT_GT(moved.norm(), 100.0);
+	EXPECT_LT((moved - (along(to) - along(from)) * axis).norm(), 0.05) << moved;
+	EXPECT_LT((Pose(saved, "haunch") - Pose(m_Created, "haunch")).norm(), 1e-6);
+	EXPECT_TRUE(CommandLine(m_Edits + PoseEdit(saved, "haunch")) == saved);
 }
 
 TEST_F(Preview, SelectsLikeTheLists)
