@@ -52,6 +52,16 @@ function(retarget_install name folder)
 	install(DIRECTORY ${folder} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup FILES_MATCHING PATTERN "*.h")
 endfunction()
 
+# retarget_screen(VARIABLE NAME SIZE): the command by which the test of this name gets a screen of its own.
+function(retarget_screen variable name size)
+	find_program(RETARGET_XVFB_RUN xvfb-run REQUIRED)
+	# Each test begins to look for a free display at a number of its own: two that look at once take the same one.
+	string(MD5 hash "${CMAKE_BINARY_DIR}/${name}")
+	string(SUBSTRING ${hash} 0 4 hash)
+	math(EXPR display "100 + 0x${hash} % 30000")
+	set(${variable} ${RETARGET_XVFB_RUN} -a -n ${display} -s "-screen 0 ${size}x24" PARENT_SCOPE)
+endfunction()
+
 # retarget_test(NAME [DISPLAY] [OPTIMISED] SOURCES ... LIBRARIES ...): a GoogleTest program; RETARGET_TEST_DATA is the
 # folder tests/data and RETARGET_SOURCE the root of the tree. With DISPLAY it runs on a screen of its own, drawn in
 # software. OPTIMISED is for tests that compute much themselves.
@@ -79,13 +89,8 @@ function(retarget_test name)
 	if(RETARGET_SANITIZE)
 		target_sources(test_${name} PRIVATE ${CMAKE_SOURCE_DIR}/tests/KeepLibraries.cpp)
 	endif()
-	find_program(RETARGET_XVFB_RUN xvfb-run REQUIRED)
-	# Each test begins to look for a free display at a number of its own: two that look at once take the same one.
-	string(MD5 hash "${CMAKE_BINARY_DIR}/${name}")
-	string(SUBSTRING ${hash} 0 4 hash)
-	math(EXPR display "100 + 0x${hash} % 30000")
-	add_test(NAME ${name} COMMAND ${RETARGET_XVFB_RUN} -a -n ${display} -s "-screen 0 1920x1200x24"
-		$<TARGET_FILE:test_${name}>)
+	retarget_screen(screen ${name} 1920x1200)
+	add_test(NAME ${name} COMMAND ${screen} $<TARGET_FILE:test_${name}>)
 	set(threads "")
 	if(RETARGET_SANITIZE MATCHES "thread")
 		# The driver draws without threads of its own, which ThreadSanitizer does not know to wait for each other.
