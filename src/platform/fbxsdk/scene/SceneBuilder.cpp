@@ -171,9 +171,13 @@ FbxFormat::VSceneBuilder::VBuilt FbxFormat::VSceneBuilder::BuildPart(
 	else if (i_rObject.m_Kind == "Geometry" && i_rObject.m_SubKind == "Mesh")
 		return AddPart(new fbxsdk::FbxMesh(name(), record));
 	else if (i_rObject.m_Kind == "Deformer" && i_rObject.m_SubKind == "Skin")
-		return AddPart(new fbxsdk::FbxSkin(name()));
+	{
+		auto* const pSkin = AddPart(new fbxsdk::FbxSkin(name()));
+		rContent.m_Skins.push_back(pSkin);
+		return pSkin;
+	}
 	else if (i_rObject.m_Kind == "Deformer" && i_rObject.m_SubKind == "Cluster")
-		return AddPart(new fbxsdk::FbxCluster(name(), record));
+		return AddPart(new fbxsdk::FbxCluster(name(), record, rContent.m_Skins));
 	else if (i_rObject.m_Kind == "Material")
 		return AddPart(i_rMaterials.ReadMaterial(i_rObject).release());
 	else if (i_rObject.m_Kind == "Texture")

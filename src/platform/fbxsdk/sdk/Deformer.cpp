@@ -15,22 +15,26 @@ void fbxsdk::FbxCluster::Load() const
 {
 	if (m_bLoaded)
 		return;
-	// Who reads one reads them all, and their mesh.
+	// Who reads one reads them all, those of other skins too, and their meshes.
 	std::vector<const FbxCluster*> clusters{this};
-	if (m_pSkin)
-		for (const FbxCluster* const pOther : m_pSkin->m_Clusters)
-			if (!pOther->m_bLoaded && pOther->m_pSkin == m_pSkin && pOther != this)
-				clusters.push_back(pOther);
+	std::vector<std::pair<const FbxMesh*, std::size_t>> meshes;
 	std::vector<FbxFormat::VDecodeJob> jobs;
-	const FbxMesh* const pMesh =
-	    m_pSkin && m_pSkin->m_pMesh && !m_pSkin->m_pMesh->m_bLoaded ? m_pSkin->m_pMesh : nullptr;
-	if (pMesh)
-		pMesh->AddJobs(jobs);
+	for (const FbxSkin* const pSkin : *m_pSkins)
+	{
+		if (pSkin->m_pMesh && !pSkin->m_pMesh->m_bLoaded && pSkin->m_pMesh->GetDeformer(0, FbxDeformer::eSkin) == pSkin)
+		{
+			meshes.emplace_back(pSkin->m_pMesh, jobs.size());
+			pSkin->m_pMesh->AddJobs(jobs);
+		}
+		for (const FbxCluster* const pOther : pSkin->m_Clusters)
+			if (!pOther->m_bLoaded && pOther->m_pSkin == pSkin && pOther != this)
+				clusters.push_back(pOther);
+	}
 	for (const FbxCluster* const pCluster : clusters)
 		pCluster->AddJobs(jobs);
 	FbxFormat::Decode(jobs);
-	if (pMesh)
-		pMesh->EndJobs(jobs);
+	for (const auto& [pMesh, first] : meshes)
+		pMesh->EndJobs(std::span(jobs).subspan(first));
 	for (const FbxCluster* const pCluster : clusters)
 		pCluster->EndJobs();
 }

@@ -52,8 +52,9 @@ public:
 private:
 	friend class FbxFormat::VSceneBuilder;
 
-	FbxCluster(std::string i_Name, const FbxFormat::VArraySource& i_rRecord)
-	    : FbxObject(std::move(i_Name)), m_Record(i_rRecord)
+	FbxCluster(
+	    std::string i_Name, const FbxFormat::VArraySource& i_rRecord, const std::vector<const FbxSkin*>& i_rSkins)
+	    : FbxObject(std::move(i_Name)), m_Record(i_rRecord), m_pSkins(&i_rSkins)
 	{
 	}
 	void Load() const;
@@ -64,6 +65,8 @@ private:
 
 	FbxFormat::VArraySource m_Record;
 	FbxNode* m_pLink = nullptr;
+	/// All of the scene.
+	const std::vector<const FbxSkin*>* m_pSkins;
 	/// The first that it belongs to.
 	const FbxSkin* m_pSkin = nullptr;
 	mutable bool m_bLoaded = false;

@@ -4,6 +4,7 @@
 #include "fbxsdk/container/ElementTree.h"
 #include "fbxsdk/container/FileBytes.h"
 #include "fbxsdk/document/Document.h"
+#include "fbxsdk/sdk/Deformer.h"
 #include "fbxsdk/sdk/Node.h"
 #include "fbxsdk/sdk/Scene.h"
 
@@ -19,5 +20,7 @@ struct fbxsdk::FbxScene::VContent
 	std::vector<std::unique_ptr<FbxNode>> m_Nodes;
 	/// What nodes consist of: attributes, deformers, materials, textures.
 	std::vector<std::unique_ptr<FbxObject>> m_Parts;
+	/// Those among the parts.
+	std::vector<const FbxSkin*> m_Skins;
 	FbxFormat::VDecodeBudget m_Budget;
 };
