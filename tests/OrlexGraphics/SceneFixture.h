@@ -1,6 +1,8 @@
 #pragma once
 
+#include "../Allocations.h"
 #include "../CoreGraphics/OffscreenContext.h"
+#include "../QueryCount.h"
 
 #include "CoreGraphics/ShaderLibrary.h"
 #include "InMemoryHost/Dispatcher.h"
@@ -39,6 +41,22 @@ protected:
 		m_Renderer.Scene()->Synchronise();
 		m_Renderer.Update();
 		m_Renderer.Render(*m_pTarget);
+	}
+
+	/// The frame that was drawn last, once more: it takes no memory, asks OpenGL for nothing and looks up no name. The
+	/// first ones make the driver compile its shaders.
+	void ExpectThatAFrameIsAWalk()
+	{
+		for (int i = 0; i < 3; ++i)
+			m_Renderer.Render(*m_pTarget);
+		const VQueryCount queries;
+		const std::size_t before = AllocationCount();
+		m_Renderer.Render(*m_pTarget);
+		EXPECT_EQ(AllocationCount() - before, 0u);
+		EXPECT_EQ(queries.Count(), 0u);
+		// The counter itself works.
+		QOpenGLContext::currentContext()->functions()->glGetError();
+		EXPECT_EQ(queries.Count(), 1u);
 	}
 
 	const QSize m_Size;

@@ -28,6 +28,9 @@ public:
 
 	void Update(const std::vector<VBox>& i_rBoxes, const QSize& i_rView)
 	{
+		// Of all that was drawn since the last update.
+		if (QOpenGLContext::currentContext()->functions()->glGetError() != GL_NO_ERROR)
+			++VBoxScene::s_GLErrors;
 		constexpr float c_Scale = 4.0f;
 		m_Drawn.clear();
 		CoreGraphics::VCameraController front;
@@ -75,8 +78,6 @@ public:
 			io_rContext.SetUniform(m_ModelColour, rDrawn.m_Colour);
 			io_rContext.DrawElements(GL_TRIANGLES, m_Box.m_Indices);
 		}
-		if (io_rContext.m_pFunctions->glGetError() != GL_NO_ERROR)
-			++VBoxScene::s_GLErrors;
 	}
 
 private:

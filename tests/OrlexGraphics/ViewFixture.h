@@ -70,7 +70,7 @@ public:
 	/// Of the view.
 	QSize m_Size;
 	std::atomic<int> m_Refreshes = 0;
-	/// Walks over the boxes after which OpenGL had complained.
+	/// Frame updates before which OpenGL had complained.
 	static std::atomic<int> s_GLErrors;
 	using VFlowScene::m_bExactPick;
 
