@@ -1,9 +1,11 @@
 #include "studio/StudioWindow.h"
 
+#include "TesselPluginInterface/IPreferenceFolders.h"
 #include "TesselPluginInterface/PathTypes.h"
 #include "UtilsFileSystem/Paths.h"
 #include "studio/FileKind.h"
 #include "studio/Named.h"
+#include "studio/Preferences.h"
 #include "studio/PreferencesDialog.h"
 #include "studio/RecentFiles.h"
 #include "studio/RetargetPanel.h"
@@ -117,6 +119,7 @@ void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
 void VStudioWindow::MakeHelpMenu()
 {
 	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&Help")), "HelpMenu", tr("Help"));
+	AddAction(rMenu, "MouseAndKeys", tr("&Mouse and Keys"), QKeySequence::HelpContents, [this] { ShowMouseAndKeys(); });
 	AddAction(rMenu, "About", tr("&About"), {}, [this] { ShowAbout(); });
 }
 
@@ -156,6 +159,34 @@ void VStudioWindow::UpdateRecentFiles()
 		return;
 	m_pRecentMenu->addSeparator();
 	AddAction(*m_pRecentMenu, "ClearRecentFiles", tr("&Clear"), {}, [this] { m_pRecentFiles->Clear(); });
+}
+
+void VStudioWindow::ShowMouseAndKeys()
+{
+	const bool bAltSelects = m_pContext->Preferences().Number(TesselPluginInterface::c_NavigationAltKey, 1) != 0;
+	const auto with = [](bool i_bAlt, const QString& i_rText)
+	{ return i_bAlt ? tr("Alt and %1").arg(i_rText) : i_rText; };
+	const std::pair<QString, QString> rows[] = {{with(!bAltSelects, tr("left button, dragged")), tr("turns the view")},
+	    {with(!bAltSelects, tr("left and right or middle button, dragged")), tr("moves the view")},
+	    {with(!bAltSelects, tr("right button, dragged; or the wheel")), tr("goes nearer and farther")},
+	    {tr("Ctrl+F"), tr("brings what is selected into the middle")},
+	    {tr("click"), tr("selects what is under the mouse, and nothing else")},
+	    {tr("Shift and click"), tr("adds it to what is selected")},
+	    {tr("Ctrl and click"), tr("adds it, or takes it away")}, {tr("Ctrl, Shift and click"), tr("takes it away")},
+	    {with(bAltSelects, tr("left button, dragged")), tr("selects all in a rectangle")},
+	    {tr("a ring, dragged"),
+	        tr("turns the selected target segment: with Ctrl by steps of 45 degrees, with Shift "
+	           "finely")},
+	    {tr("an arrow or a square corner, dragged"), tr("moves the root of the target subject")},
+	    {tr("Ctrl++ and Ctrl+-"), tr("make the manipulator larger and smaller")},
+	    {tr("Alt+T and Alt+R"), tr("add a position and a rotation target")}};
+	QString text = tr("<b>In the preview</b>") + QStringLiteral("<table cellpadding='3'>");
+	for (const auto& [rInput, rEffect] : rows)
+		text += QStringLiteral("<tr><td>%1</td><td>%2</td></tr>").arg(rInput.toHtmlEscaped(), rEffect.toHtmlEscaped());
+	QMessageBox box(
+	    QMessageBox::NoIcon, tr("Mouse and keys"), text + QStringLiteral("</table>"), QMessageBox::Close, this);
+	Named(&box, "MouseAndKeysBox", tr("Mouse and keys"));
+	box.exec();
 }
 
 void VStudioWindow::ShowAbout()

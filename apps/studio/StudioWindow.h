@@ -66,6 +66,8 @@ private:
 	    std::function<void()> i_Run);
 	void AskAndOpen(int i_Kind);
 	void UpdateRecentFiles();
+	/// What they do in the preview, as the preferences have it.
+	void ShowMouseAndKeys();
 	void ShowAbout();
 	void Say(const QString& i_rText);
 	/// Asks what is to become of changes that are not saved.

@@ -198,6 +198,28 @@ TEST_F(Window, KeepsItsLayout)
 	EXPECT_TRUE(m_pWindow->RetargetPanel()->Widget()->isVisible());
 }
 
+TEST_F(Window, TellsWhatTheMouseDoes)
+{
+	const char* const selects = "<td>Alt and left button, dragged</td><td>selects all in a rectangle</td>";
+	const char* const turns = "<td>Alt and left button, dragged</td><td>turns the view</td>";
+	for (const int number : {1, 0})
+	{
+		m_pWindow->Context().Preferences().SetNumber(TesselPluginInterface::c_NavigationAltKey, number);
+		QString text;
+		QTimer::singleShot(0, m_pWindow.get(),
+		    [&]
+		    {
+			    auto* const pBox = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+			    ASSERT_TRUE(pBox);
+			    text = pBox->text();
+			    pBox->button(QMessageBox::Close)->click();
+		    });
+		m_pWindow->findChild<QAction*>("MouseAndKeys")->trigger();
+		EXPECT_EQ(text.contains(selects), number == 1) << text.toStdString();
+		EXPECT_EQ(text.contains(turns), number == 0);
+	}
+}
+
 TEST_F(Window, AsksBeforeUnsavedChangesAreLost)
 {
 	LoadPanel();
