@@ -107,12 +107,12 @@ FbxFormat::VImportResult FbxFormat::VSceneBuilder::Build(
 	const bool bAll = BuildObjects(i_rKind.m_Version);
 	Connect();
 	TellUnreached();
-	if (!io_rProgress.Tell(100.0f, "Building the scene"))
-		BuildEmpty();
 	for (const std::string& rError : {rContent.m_Tree.Error(), rContent.m_pDocument->Error(),
 	         std::string(bAll ? "" : "it has more nodes, or parts of nodes, than are read")})
 		if (result.m_Error.empty())
 			result.m_Error = rError;
+	if (!io_rProgress.Tell(100.0f, "Building the scene"))
+		BuildEmpty();
 	return result;
 }
 
