@@ -235,7 +235,7 @@ const VHostileRow c_Rows[]{
         []
         {
 	        std::vector<VTestRecord> records = SmallRecords(c_SmallFiles[1]);
-	        const std::string name(10'000'000, '\xe9');
+	        const std::string name(10'000'000, 'x');
 	        ForEach(records, "Model", [&](VTestRecord& io_rRecord) { io_rRecord.m_Values[1] = name; });
 	        ForEach(records, "RelativeFilename", [&](VTestRecord& io_rRecord) { io_rRecord.m_Values[0] = name; });
 	        return Write(c_Forms[1], records);
