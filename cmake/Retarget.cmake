@@ -101,6 +101,11 @@ function(retarget_test name)
 		"QT_QPA_PLATFORM=xcb;LIBGL_ALWAYS_SOFTWARE=1;ASAN_OPTIONS=detect_leaks=1;LSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/display.supp:print_suppressions=0;${threads}")
 endfunction()
 
+# retarget_long_test(NAME SECONDS): begins before shorter ones, so that it does not run alone at the end.
+function(retarget_long_test name seconds)
+	set_tests_properties(${name} PROPERTIES COST ${seconds})
+endfunction()
+
 # retarget_package(): the CMake package config of all that was installed, so that find_package(RetargetSetup) gives
 # RetargetSetup::<Library>.
 function(retarget_package)

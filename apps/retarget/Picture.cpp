@@ -70,10 +70,13 @@ std::vector<NVX::ISelectionItem> Segments(const VRetargetSetup& i_rDocument)
 QImage Draw(VSession& io_rSession, const VRenderSettings& i_rSettings)
 {
 	const QSize size(i_rSettings.m_Width, i_rSettings.m_Height);
-	const auto pScene = NVX::MakeShared<VRetargetSetupScene>(std::make_shared<CoreGraphics::VShaderLibrary>(),
-	    io_rSession.Dispatcher(), std::make_shared<InMemoryHost::VSelectionManager>(),
-	    NVX::MakeShared<OrlexGraphics::VSkinCache>(io_rSession.Dispatcher()), io_rSession.SharedDocument(),
-	    NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory), false);
+	const auto pSkins = NVX::MakeShared<OrlexGraphics::VSkinCache>(io_rSession.Dispatcher());
+	if (!i_rSettings.m_Skins.empty())
+		pSkins->SetFolders(OrlexGraphics::c_pSubjectSkins, {UtilsFileSystem::PathFromUtf8(i_rSettings.m_Skins)});
+	const auto pScene =
+	    NVX::MakeShared<VRetargetSetupScene>(std::make_shared<CoreGraphics::VShaderLibrary>(), io_rSession.Dispatcher(),
+	        std::make_shared<InMemoryHost::VSelectionManager>(), pSkins, io_rSession.SharedDocument(),
+	        NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory), false);
 	OrlexGraphics::VFrameRenderer renderer;
 	renderer.Initialise();
 	CoreGraphics::VCameraController& rCamera = renderer.m_Input.m_Camera;

@@ -57,6 +57,8 @@ VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender)
 	pApp->add_option("FILE.qrr", pSettings->m_In, "The retarget subject, or a legacy one (.qrx)")->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton, to be drawn with it")
 	    ->option_text("FILE.qrs");
+	pApp->add_option("--skins", pSettings->m_Skins, "Where the target's FBX lies, whose skin is drawn on the bones")
+	    ->option_text("FOLDER");
 	std::string views;
 	for (const char* pView : c_Views)
 		views += (views.empty() ? "" : "|") + std::string(pView);

@@ -16,6 +16,8 @@ struct VRenderSettings
 	std::string m_In;
 	/// Empty for none.
 	std::string m_Source;
+	/// Folder; empty for none.
+	std::string m_Skins;
 	/// "-" for standard output.
 	std::string m_Out;
 	std::string m_View;

@@ -8,9 +8,14 @@
 #include "InMemoryHost/Flow.h"
 #include "InMemoryHost/Selection.h"
 #include "OrlexGraphics/RenderManipulator.h"
+#include "OrlexGraphics/SceneFramebufferObject.h"
 
-// What two subjects cost, with bones, joints, axes, targets and the manipulator, beside a frame that only clears. The
-// argument is the number of segments of each.
+#include <QQmlPropertyMap>
+#include <QQuickFramebufferObject>
+#include <QQuickView>
+
+// What two subjects cost, with bones, joints, axes, targets and the manipulator, beside a frame that only clears, off
+// screen and in a window. The argument is the number of segments of each.
 
 namespace
 {
@@ -65,21 +70,72 @@ NVX::CountedPointer<TesselPluginInterface::IFlowFrame> MakeFrame(std::uint32_t i
 }
 
 /// Two subjects of so many segments and the manipulator, or nothing.
-Frames::VDrawing MakeDrawing(std::uint32_t i_Segments)
+std::shared_ptr<Flow2Graphics::VFlowScene> MakeScene(std::uint32_t i_Segments)
 {
 	const auto pScene = std::make_shared<Flow2Graphics::VFlowScene>(std::make_shared<CoreGraphics::VShaderLibrary>(),
 	    std::make_shared<InMemoryHost::VSelectionManager>(), nullptr, std::make_shared<InMemoryHost::VDispatcher>(),
 	    false);
-	Frames::VDrawing drawing(pScene);
-	OrlexGraphics::VSubjectOptions& rOptions = drawing.Options().m_LabellingSubject;
-	rOptions.m_bJoints = rOptions.m_bAxes = rOptions.m_bTargets = true;
-	drawing.Options().m_SolvingSubject = rOptions;
 	if (i_Segments > 0)
 	{
 		pScene->SetFrame(MakeFrame(i_Segments));
 		pScene->RenderManipulator()->SetVisible(true);
 	}
+	return pScene;
+}
+
+Frames::VDrawing MakeDrawing(std::uint32_t i_Segments)
+{
+	Frames::VDrawing drawing(MakeScene(i_Segments));
+	OrlexGraphics::VSubjectOptions& rOptions = drawing.Options().m_LabellingSubject;
+	rOptions.m_bJoints = rOptions.m_bAxes = rOptions.m_bTargets = true;
+	drawing.Options().m_SolvingSubject = rOptions;
 	return drawing;
+}
+
+/// Clears its framebuffer and draws nothing.
+class VEmptyItem : public QQuickFramebufferObject
+{
+	struct VClear : Renderer
+	{
+		void render() override
+		{
+			QOpenGLFunctions& rGL = *QOpenGLContext::currentContext()->functions();
+			rGL.glClearColor(0.2f, 0.2f, 0.2f, 1.0f);
+			rGL.glClear(GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT);
+		}
+		QOpenGLFramebufferObject* createFramebufferObject(const QSize& i_rSize) override
+		{
+			QOpenGLFramebufferObjectFormat format;
+			format.setAttachment(QOpenGLFramebufferObject::CombinedDepthStencil);
+			format.setSamples(4);
+			return new QOpenGLFramebufferObject(i_rSize, format);
+		}
+	};
+
+	Renderer* createRenderer() const override { return new VClear; }
+};
+
+/// Frames of a window that is filled by the item, from its update to the swap of buffers.
+void MeasureWindow(benchmark::State& io_rState, QQuickItem* i_pItem)
+{
+	QQuickView view;
+	view.setResizeMode(QQuickView::SizeRootObjectToView);
+	view.setContent(QUrl(), nullptr, i_pItem);
+	view.resize(Frames::c_Size);
+	view.show();
+	bool bSwapped = false;
+	QObject::connect(&view, &QQuickWindow::frameSwapped, &view, [&] { bSwapped = true; });
+	const auto frame = [&]
+	{
+		bSwapped = false;
+		i_pItem->update();
+		while (!bSwapped)
+			QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+	};
+	for (int i = 0; i < 3; ++i)
+		frame();
+	for (auto _ : io_rState)
+		frame();
 }
 
 std::uint32_t Segments(const benchmark::State& i_rState)
@@ -107,6 +163,26 @@ void SubjectsUpdate(benchmark::State& io_rState)
 	MakeDrawing(Segments(io_rState)).MeasureUpdates(io_rState);
 }
 
+void EmptyWindow(benchmark::State& io_rState)
+{
+	MeasureWindow(io_rState, new VEmptyItem);
+}
+
+void SubjectsWindow(benchmark::State& io_rState)
+{
+	const auto pScene = MakeScene(Segments(io_rState));
+	auto* const pItem = new OrlexGraphics::VSceneFramebufferObject;
+	pItem->SetScene(pScene.get());
+	for (const char* pName : {"Joints", "Axes", "Targets"})
+		for (const char* pKind : {"LabellingSubject", "SolvingSubject"})
+		{
+			const QString key = QString(pKind) + pName;
+			pItem->GetSceneOptions()->insert(key, true);
+			pItem->OnSceneOptionsMapChanged(key, true);
+		}
+	MeasureWindow(io_rState, pItem);
+}
+
 void Subjects(benchmark::internal::Benchmark* io_pBenchmark)
 {
 	io_pBenchmark->Arg(70)->Arg(300)->MeasureProcessCPUTime()->Unit(benchmark::kMicrosecond);
@@ -116,11 +192,18 @@ BENCHMARK(ClearedFrame)->Apply(Subjects);
 BENCHMARK(SubjectsFrame)->Apply(Subjects);
 BENCHMARK(SubjectsHoverPick)->Apply(Subjects);
 BENCHMARK(SubjectsUpdate)->Apply(Subjects);
+// The last ones: a window takes the context that the others draw with.
+BENCHMARK(EmptyWindow)->Apply(Subjects);
+BENCHMARK(SubjectsWindow)->Apply(Subjects);
 
 } // namespace
 
 int main(int i_Count, char** i_ppArguments)
 {
-	return Frames::Main(
-	    i_Count, i_ppArguments, {{"SubjectsFrame", "ClearedFrame", 10.0}, {"SubjectsHoverPick", "ClearedFrame", 2.0}});
+	// The window's frames follow each other at once and on this thread.
+	qputenv("QSG_RENDER_LOOP", "basic");
+	qputenv("QT_QPA_UPDATE_IDLE_TIME", "0");
+	return Frames::Main(i_Count, i_ppArguments,
+	    {{"SubjectsFrame", "ClearedFrame", 10.0}, {"SubjectsHoverPick", "ClearedFrame", 2.0},
+	        {"SubjectsWindow", "EmptyWindow", 1.5}});
 }

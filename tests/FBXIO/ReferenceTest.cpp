@@ -2,10 +2,12 @@
 
 #include "TestLog.h"
 
+#include <fbxsdk.h>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
 #include <fstream>
+#include <map>
 
 using namespace FBXIO;
 
@@ -110,6 +112,35 @@ TEST_P(ReferenceFile, PlacedMeshesAgree)
 			EXPECT_NEAR(bounds[k], expected, std::max(0.01, 1e-5 * std::abs(expected))) << placed[i].m_Name << ' ' << k;
 		}
 	}
+}
+
+/// Of each mesh below the node.
+void CountClusters(FbxNode& i_rNode, std::map<std::string, int>& io_rCounts)
+{
+	FbxMesh* const pMesh = i_rNode.GetMesh();
+	for (int i = 0; FbxDeformer* const pSkin = pMesh ? pMesh->GetDeformer(i, FbxDeformer::eSkin) : nullptr; ++i)
+		io_rCounts[i_rNode.GetName()] += static_cast<FbxSkin*>(pSkin)->GetClusterCount();
+	for (int i = 0; i < i_rNode.GetChildCount(); ++i)
+		CountClusters(*i_rNode.GetChild(i), io_rCounts);
+}
+
+TEST_P(ReferenceFile, ClustersAgree)
+{
+	const nlohmann::json reference = Reference(GetParam());
+	FbxManager* const pManager = FbxManager::Create();
+	FbxScene* const pScene = FbxScene::Create(pManager, "scene");
+	FbxImporter* const pImporter = FbxImporter::Create(pManager, "importer");
+	ASSERT_TRUE(pImporter->Initialize((c_Folder + GetParam() + ".fbx").c_str(), -1, nullptr));
+	ASSERT_TRUE(pImporter->Import(pScene, false));
+	std::map<std::string, int> counts;
+	CountClusters(*pScene->GetRootNode(), counts);
+	int sum = 0;
+	for (const auto& [rName, rCount] : counts)
+		sum += rCount;
+	EXPECT_EQ(sum, reference["clusters"]);
+	for (const nlohmann::json& rMesh : reference["placedMeshes"])
+		EXPECT_EQ(counts[rMesh["name"]], rMesh["skinClusters"]) << rMesh["name"];
+	pManager->Destroy();
 }
 
 TEST_P(ReferenceFile, SkinsAgree)

@@ -40,9 +40,10 @@ public:
 	{
 		m_Session.LoadTarget(i_rSubject);
 		m_Session.LoadSource(c_Performer);
+		const auto pSkins = NVX::MakeShared<OrlexGraphics::VSkinCache>(m_Session.Dispatcher());
+		pSkins->SetFolders(OrlexGraphics::c_pSubjectSkins, {Data("fbx")});
 		m_pScene = NVX::MakeShared<VRetargetSetupScene>(std::make_shared<CoreGraphics::VShaderLibrary>(),
-		    m_Session.Dispatcher(), m_pSelection, NVX::MakeShared<OrlexGraphics::VSkinCache>(m_Session.Dispatcher()),
-		    m_Session.SharedDocument(),
+		    m_Session.Dispatcher(), m_pSelection, pSkins, m_Session.SharedDocument(),
 		    NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory), false);
 		m_pItem = new OrlexGraphics::VSceneFramebufferObject;
 		m_pItem->SetScene(m_pScene.get());
@@ -105,8 +106,8 @@ TEST(Render, DrawsWhatThePreviewShows)
 	{
 		const std::string view = CommandLine::c_Views[i];
 		SCOPED_TRACE(view);
-		const VRun run = RunRetarget({"-q", "render", "x.qrr", "--source", c_Performer, "--view", view, "--size",
-		                                 "320x200", "-o", view + ".png"},
+		const VRun run = RunRetarget({"-q", "render", "x.qrr", "--source", c_Performer, "--skins", Data("fbx"),
+		                                 "--view", view, "--size", "320x200", "-o", view + ".png"},
 		    folder.Path());
 		EXPECT_EQ(run.m_Status, 0) << run.m_Err;
 		const QImage drawn = QImage(QString::fromStdString((folder / (view + ".png")).string()));
@@ -116,10 +117,12 @@ TEST(Render, DrawsWhatThePreviewShows)
 		before = drawn;
 	}
 	EXPECT_EQ(folder.Names().size(), CommandLine::c_Views.size() + 1);
-	const VRun run = RunRetarget(
-	    {"-q", "render", "x.qrr", "--source", c_Performer, "--view", "bottom", "--size", "320x200", "-o", "-"},
-	    folder.Path());
-	EXPECT_EQ(run.m_Out, folder.Read("bottom.png"));
+	const std::vector<std::string> bottom{
+	    "-q", "render", "x.qrr", "--source", c_Performer, "--view", "bottom", "--size", "320x200", "-o", "-"};
+	std::vector<std::string> skinned = bottom;
+	skinned.insert(skinned.end(), {"--skins", Data("fbx")});
+	EXPECT_EQ(RunRetarget(skinned, folder.Path()).m_Out, folder.Read("bottom.png"));
+	EXPECT_NE(RunRetarget(bottom, folder.Path()).m_Out, folder.Read("bottom.png")) << "bones alone";
 }
 
 TEST(Render, TellsWhatItLacks)
@@ -136,7 +139,8 @@ TEST(Render, TellsWhatItLacks)
 	    {":32123", "xcb", {"no such display", {"-q", "render", "x.qrr", "-o", "x.png"}, 4, "", noDisplay}},
 	    {"", "offscreen",
 	        {"no OpenGL", {"-q", "render", "x.qrr", "-o", "x.png"}, 4, "", "(offscreen) has no OpenGL to draw with"}},
-	    {"", "", {"files come first", {"render", "nowhere.qrr", "-o", "x.png"}, 3, "", "\"nowhere.qrr\" could not be read"}},
+	    {"", "",
+	        {"files come first", {"render", "nowhere.qrr", "-o", "x.png"}, 3, "", "\"nowhere.qrr\" could not be read"}},
 	    {nullptr, nullptr, {"no such folder", {"-q", "render", "x.qrr", "-o", "no/x.png"}, 4, "", "error retarget: "}},
 	};
 	for (const auto& rRow : rows)
