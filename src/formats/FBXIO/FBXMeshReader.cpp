@@ -64,6 +64,13 @@ bool Exists(const boost::filesystem::path& i_rPath)
 
 } // namespace
 
+void FBXIO::FBXMeshReader::SetFile(const std::string& i_rPath, std::uint64_t i_Bytes)
+{
+	m_Path = i_rPath;
+	m_FileBytes = i_Bytes;
+	m_Images.SetFileBytes(i_Bytes);
+}
+
 void FBXIO::FBXMeshReader::SetSkeleton(std::shared_ptr<VSkinSkeleton> i_pSkeleton)
 {
 	m_pSkeleton = std::move(i_pSkeleton);
@@ -94,7 +101,7 @@ void FBXIO::FBXMeshReader::Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TV
 	}
 	o_rMesh.m_Parts.assign(std::max(i_rNode.GetMaterialCount(), 1), VMeshPart());
 	for (int i = 0; i < i_rNode.GetMaterialCount(); ++i)
-		ReadMaterial(i_rNode.GetMaterial(i), o_rMesh.m_Parts[i]);
+		o_rMesh.m_Parts[i] = PartOf(i_rNode.GetMaterial(i));
 
 	o_rMesh.m_Vertices.assign(count, TVertex());
 	const auto& rNormals = pNormals->GetDirectArray();
@@ -132,6 +139,14 @@ void FBXIO::FBXMeshReader::Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVe
 		SplitIntoParts<std::uint16_t>(io_rFrom, indices, io_rMesh.m_Parts);
 	else
 		SplitIntoParts<std::uint32_t>(io_rFrom, indices, io_rMesh.m_Parts);
+}
+
+const FBXIO::VMeshPart& FBXIO::FBXMeshReader::PartOf(FbxSurfaceMaterial* i_pMaterial)
+{
+	const auto [entry, bNew] = m_PartOfMaterial.try_emplace(i_pMaterial);
+	if (bNew)
+		ReadMaterial(i_pMaterial, entry->second);
+	return entry->second;
 }
 
 void FBXIO::FBXMeshReader::ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPart& io_rPart)
@@ -204,11 +219,11 @@ bool FBXIO::FBXMeshReader::Take(
     FbxNode& i_rNode, FbxMesh& io_rFrom, std::size_t i_VertexSize, std::uint64_t i_MoreBytes)
 {
 	FbxGeometryElementUV* const pUV = io_rFrom.GetElementUV(0);
-	const std::uint64_t vertices =
-	    std::uint64_t(io_rFrom.GetControlPointsCount()) + (pUV ? pUV->GetDirectArray().GetCount() : 0);
+	const std::uint64_t points = io_rFrom.GetControlPointsCount();
+	const std::uint64_t vertices = points + (pUV ? pUV->GetDirectArray().GetCount() : 0);
 	// Of each polygon vertex one index, and the indices of a triangle.
-	const std::uint64_t bytes =
-	    i_MoreBytes + vertices * i_VertexSize + io_rFrom.GetPolygonVertexCount() * std::uint64_t(16);
+	const std::uint64_t bytes = i_MoreBytes + vertices * i_VertexSize + points * Limits::c_PointBytes
+	    + io_rFrom.GetPolygonVertexCount() * std::uint64_t(16) + i_rNode.GetMaterialCount() * Limits::c_PartBytes;
 	const bool bEnough = bytes <= m_BytesLeft;
 	if (bEnough)
 		m_BytesLeft -= bytes;
@@ -278,7 +293,7 @@ std::int64_t FBXIO::FBXMeshReader::BindBone(FbxCluster& i_rCluster)
 	}
 	VSkinBone& rBone = (*m_pSkeleton)[bone];
 	rBone.m_InverseBind = SystemMatrix(link.Inverse() * transform);
-	CheckTransform(rBone.m_InverseBind, rBone.m_Name);
+	CheckTransform(rBone.m_InverseBind, rBone.m_Name, m_Searched.insert(&i_rCluster).second);
 	return bone;
 }
 

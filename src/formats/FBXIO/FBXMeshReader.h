@@ -17,8 +17,8 @@ namespace FBXIO
 class FBXMeshReader
 {
 public:
-	/// The file whose folder textures are looked for in.
-	void SetPath(const std::string& i_rPath) { m_Path = i_rPath; }
+	/// The file, whose folder textures are looked for in and whose size tells how much it may become.
+	void SetFile(const std::string& i_rPath, std::uint64_t i_Bytes);
 
 	/// File units to millimetres.
 	void SetUnitScale(float i_UnitScale) { m_UnitScale = i_UnitScale; }
@@ -29,7 +29,7 @@ public:
 	static bool IsMesh(FbxNode& i_rNode);
 
 	/// Before all meshes of the scene are read once more: they count against the limit from here on.
-	void BeginMeshes() { m_BytesLeft = Limits::c_MeshBytes; }
+	void BeginMeshes() { m_BytesLeft = Limits::MeshBytes(m_FileBytes); }
 
 	/// In the node's own space. False if the mesh is damaged.
 	bool ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh);
@@ -53,6 +53,8 @@ private:
 	void Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh);
 	/// False, and told, if the mesh is beyond the limit.
 	bool Take(FbxNode& i_rNode, FbxMesh& io_rFrom, std::size_t i_VertexSize, std::uint64_t i_MoreBytes = 0);
+	/// Without indices. Read once: any number of nodes may share a material, and it any number of textures.
+	const VMeshPart& PartOf(FbxSurfaceMaterial* i_pMaterial);
 	void ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPart& io_rPart);
 	std::string FindTexture(const FbxFileTexture& i_rTexture) const;
 	/// 0, and told, if the skeleton has no bone of the link's name.
@@ -62,13 +64,15 @@ private:
 
 	ImageCache m_Images;
 	std::string m_Path;
+	std::uint64_t m_FileBytes = 0;
+	std::unordered_map<const FbxSurfaceMaterial*, VMeshPart> m_PartOfMaterial;
 	std::shared_ptr<VSkinSkeleton> m_pSkeleton;
 	std::unordered_map<std::string, std::int64_t> m_BoneOfName;
 	float m_UnitScale = 1.0f;
-	std::uint64_t m_BytesLeft = Limits::c_MeshBytes;
+	std::uint64_t m_BytesLeft = 0;
 	/// Nodes whose meshes' findings have been told.
 	std::set<const FbxNode*> m_Told;
-	/// Skins whose bones have been looked for, and clusters of which it was told that theirs is missing.
+	/// Skins whose bones have been looked for, and clusters of which it was told that theirs is missing or damaged.
 	std::set<const FbxObject*> m_Searched;
 };
 

@@ -40,7 +40,7 @@ public:
 
 private:
 	/// i_rInitialize makes the importer ready for what it is to read.
-	bool Load(const std::string& i_rPath, const std::function<bool()>& i_rInitialize);
+	bool Load(const std::string& i_rPath, std::uint64_t i_Bytes, const std::function<bool()>& i_rInitialize);
 	void TellRefusal(const std::string& i_rPath);
 	void Import();
 	void ReadSettings();
@@ -67,12 +67,14 @@ FBXIO::FBXReader::VImpl::~VImpl()
 bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 {
 	boost::system::error_code error;
-	if (status(UtilsFileSystem::PathFromUtf8(i_rPath), error).type() != boost::filesystem::regular_file)
+	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(i_rPath);
+	if (status(path, error).type() != boost::filesystem::regular_file)
 	{
 		NVX_LOG("FBXIO", NVX::ELogError, "File %1% not found", i_rPath);
 		return false;
 	}
-	return Load(i_rPath,
+	const boost::uintmax_t bytes = file_size(path, error);
+	return Load(i_rPath, error ? 0 : bytes,
 	    [&]
 	    {
 		    int format = -1;
@@ -85,7 +87,7 @@ bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 
 bool FBXIO::FBXReader::VImpl::LoadMemory(std::string_view i_Bytes, const std::string& i_rPath)
 {
-	return Load(i_rPath,
+	return Load(i_rPath, i_Bytes.size(),
 	    [&]
 	    {
 		    VMemoryStream stream(i_Bytes, m_pManager->GetIOPluginRegistry()->FindReaderIDByExtension("fbx"));
@@ -93,10 +95,11 @@ bool FBXIO::FBXReader::VImpl::LoadMemory(std::string_view i_Bytes, const std::st
 	    });
 }
 
-bool FBXIO::FBXReader::VImpl::Load(const std::string& i_rPath, const std::function<bool()>& i_rInitialize)
+bool FBXIO::FBXReader::VImpl::Load(
+    const std::string& i_rPath, std::uint64_t i_Bytes, const std::function<bool()>& i_rInitialize)
 {
 	NVX_LOG("FBXIO", NVX::ELogInformation, "Loading file %1%", i_rPath);
-	m_MeshReader.SetPath(i_rPath);
+	m_MeshReader.SetFile(i_rPath, i_Bytes);
 	m_pManager = FbxManager::Create();
 	if (!m_pManager)
 		return false;

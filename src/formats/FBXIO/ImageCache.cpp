@@ -1,28 +1,26 @@
 #include "FBXIO/ImageCache.h"
 
 #include "DebugServices/GlobalLog.h"
-#include "FBXIO/Limits.h"
+#include "FBXIO/Picture.h"
 
-#include <QBuffer>
 #include <QFileInfo>
-#include <QImageReader>
 
 #include <algorithm>
 
-namespace
+std::shared_ptr<const QImage> FBXIO::ImageCache::Read(
+    const QByteArray& i_rBytes, const QByteArray& i_rFormat, const std::string& i_rName, std::uint64_t& io_rBytesLeft)
 {
-
-/// Empty if it is no picture, or one that is too large: some hundred bytes can hold gigabytes of one colour.
-std::shared_ptr<const QImage> ReadImage(QImageReader& io_rReader)
-{
-	const QSize size = io_rReader.size();
-	if (size.isValid() && std::uint64_t(size.width()) * std::uint64_t(size.height()) * 4 > FBXIO::Limits::c_ImageBytes)
-		return {};
-	auto pImage = std::make_shared<const QImage>(io_rReader.read());
-	return pImage->isNull() ? nullptr : std::move(pImage);
+	VPicture picture = ReadPicture(i_rBytes, i_rFormat, io_rBytesLeft);
+	if (!picture.m_Image.isNull())
+		return std::make_shared<const QImage>(std::move(picture.m_Image));
+	if (picture.m_bTooLarge)
+		NVX_LOG("Import", NVX::ELogError,
+		    "Failed to load %1%: its %2% by %3% points, or all pictures of the FBX file together, are too large",
+		    i_rName, picture.m_Size.width(), picture.m_Size.height());
+	else
+		NVX_LOG("Import", NVX::ELogError, "Failed to load %1%", i_rName);
+	return {};
 }
-
-} // namespace
 
 std::shared_ptr<const QImage> FBXIO::ImageCache::Get(const std::string& i_rPath)
 {
@@ -31,16 +29,13 @@ std::shared_ptr<const QImage> FBXIO::ImageCache::Get(const std::string& i_rPath)
 		return entry->second;
 	std::string path = i_rPath;
 	std::replace(path.begin(), path.end(), '\\', '/');
-	const QString file = QString::fromStdString(path);
+	const QFileInfo info(QString::fromStdString(path));
+	QByteArray bytes;
 	// A file may name a device, whose reading would never end.
-	if (QFileInfo(file).isFile())
-	{
-		QImageReader reader(file);
-		entry->second = ReadImage(reader);
-	}
-	if (!entry->second)
-		NVX_LOG("Import", NVX::ELogError, "Failed to load %1%", i_rPath);
-	return entry->second;
+	if (QFile file(info.filePath());
+	    info.isFile() && info.size() <= qint64(Limits::c_ImageBytes) && file.open(QIODevice::ReadOnly))
+		bytes = file.readAll();
+	return entry->second = Read(bytes, info.suffix().toLower().toLatin1(), i_rPath, m_BytesLeft);
 }
 
 std::shared_ptr<const QImage> FBXIO::ImageCache::Get(
@@ -52,11 +47,6 @@ std::shared_ptr<const QImage> FBXIO::ImageCache::Get(
 	const std::string content = i_rRead();
 	if (content.empty() || content.size() > Limits::c_ImageBytes)
 		return entry->second;
-	QByteArray bytes = QByteArray::fromRawData(content.data(), int(content.size()));
-	QBuffer buffer(&bytes);
-	QImageReader reader(&buffer);
-	entry->second = ReadImage(reader);
-	if (!entry->second)
-		NVX_LOG("Import", NVX::ELogError, "Failed to load %1%", i_rName);
-	return entry->second;
+	return entry->second =
+	           Read(QByteArray::fromRawData(content.data(), int(content.size())), {}, i_rName, m_BytesLeftInFile);
 }

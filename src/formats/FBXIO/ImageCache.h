@@ -1,7 +1,10 @@
 #pragma once
 
+#include "FBXIO/Limits.h"
+
 #include <QImage>
 
+#include <cstdint>
 #include <functional>
 #include <map>
 #include <memory>
@@ -10,10 +13,14 @@
 namespace FBXIO
 {
 
-/// Images by the exact path that they were asked for with. Belongs to one thread at a time.
+/// Images by the exact path that they were asked for with. Belongs to one thread at a time. What is beyond the limits
+/// for pictures is left out, told in the category "Import".
 class ImageCache
 {
 public:
+	/// Of the FBX file: it tells how large the pictures in it may be together.
+	void SetFileBytes(std::uint64_t i_Bytes) { m_BytesLeftInFile = Limits::ImagesBytes(i_Bytes); }
+
 	/// Reads the file the first time. Empty if it is no image: told once in the category "Import".
 	std::shared_ptr<const QImage> Get(const std::string& i_rPath);
 
@@ -21,6 +28,12 @@ public:
 	std::shared_ptr<const QImage> Get(const std::string& i_rName, const std::function<std::string()>& i_rRead);
 
 private:
+	/// Takes from io_rBytesLeft.
+	static std::shared_ptr<const QImage> Read(const QByteArray& i_rBytes, const QByteArray& i_rFormat,
+	    const std::string& i_rName, std::uint64_t& io_rBytesLeft);
+
+	std::uint64_t m_BytesLeft = Limits::c_ImagesBytes;
+	std::uint64_t m_BytesLeftInFile = 0;
 	std::map<std::string, std::shared_ptr<const QImage>> m_Images;
 };
 

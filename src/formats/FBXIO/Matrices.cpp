@@ -13,14 +13,15 @@ QMatrix4x4 FBXIO::SystemMatrix(const FbxAMatrix& i_rMatrix)
 	return matrix;
 }
 
-void FBXIO::CheckTransform(QMatrix4x4& io_rMatrix, const std::string& i_rName)
+void FBXIO::CheckTransform(QMatrix4x4& io_rMatrix, const std::string& i_rName, bool i_bTell)
 {
 	// Asking for the entries this way makes Qt forget what special kind of matrix it takes this one for.
 	const float* const pEntries = io_rMatrix.data();
 	for (int i = 0; i < 16; ++i)
 		if (!std::isfinite(pEntries[i]))
 		{
-			NVX_LOG("FBXIO", NVX::ELogError, "Invalid transform for: %1%; setting to identity", i_rName);
+			if (i_bTell)
+				NVX_LOG("FBXIO", NVX::ELogError, "Invalid transform for: %1%; setting to identity", i_rName);
 			io_rMatrix.setToIdentity();
 			return;
 		}

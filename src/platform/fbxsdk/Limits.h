@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 
@@ -26,6 +27,19 @@ inline constexpr std::size_t c_Parts = 10'000;
 
 /// All arrays that are decoded from one file, as bytes of their final storage.
 inline constexpr std::uint64_t c_DecodedBytes = 256'000'000;
+
+/// Of a small file less: this much for each of its bytes, and some for what is all alike. The arrays of exporters are
+/// two to ten times as large as what they are deflated to; those of bombs a thousand times.
+inline constexpr std::uint64_t c_DecodedPerByte = 32;
+inline constexpr std::uint64_t c_DecodedOfAny = 16'000'000;
+
+constexpr std::uint64_t DecodedBytes(std::uint64_t i_FileBytes)
+{
+	return std::min(c_DecodedBytes, c_DecodedOfAny + c_DecodedPerByte * i_FileBytes);
+}
+
+/// Names and paths, which messages, bones and parts of meshes repeat, are cut to this. It is the longest path of Linux.
+inline constexpr std::size_t c_TextBytes = 4096;
 
 /// The best ratio that the deflate format can reach: 258 bytes from two bits. An array that claims more than this
 /// cannot be in the bytes that it has.

@@ -1,5 +1,6 @@
 #include "fbxsdk/document/Document.h"
 
+#include "DebugServices/GlobalLog.h"
 #include "fbxsdk/Limits.h"
 #include "fbxsdk/container/Values.h"
 
@@ -101,6 +102,20 @@ void FbxFormat::VDocument::ReadConnections()
 			m_Connections.push_back(connection);
 		}
 	}
+}
+
+std::string FbxFormat::VDocument::Decoded(std::string_view i_Text) const
+{
+	if (i_Text.size() <= Limits::c_TextBytes)
+		return DecodeText(i_Text, m_bEscapes);
+	// Not inside a character of UTF-8, whose bytes behind the first are of the form 10xxxxxx.
+	std::size_t size = Limits::c_TextBytes;
+	while (size > Limits::c_TextBytes - 4 && (i_Text[size] & 0xC0) == 0x80)
+		--size;
+	std::string text = DecodeText(i_Text.substr(0, size), m_bEscapes);
+	NVX_LOG("FBXIO", NVX::ELogWarning, "A name or path of %1% bytes is cut to %2%: %3%...", i_Text.size(), size,
+	    text.substr(0, 64));
+	return text;
 }
 
 FbxFormat::VElementIndex FbxFormat::VDocument::GlobalSettings() const

@@ -59,8 +59,8 @@ public:
 	/// Of the text form: its texts have escapes.
 	bool HasEscapes() const { return m_bEscapes; }
 
-	/// Texts of this document, for the world outside.
-	std::string Decoded(std::string_view i_Text) const { return DecodeText(i_Text, m_bEscapes); }
+	/// Texts of this document, for the world outside; told in the log category "FBXIO" where they are cut.
+	std::string Decoded(std::string_view i_Text) const;
 
 	/// What of the document is missing, empty if nothing is.
 	const std::string& Error() const { return m_Error; }

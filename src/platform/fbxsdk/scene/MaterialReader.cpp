@@ -81,8 +81,10 @@ bool EqualInAnyCase(std::string_view i_Text, std::string_view i_Lower)
 } // namespace
 
 FbxFormat::VMaterialReader::VMaterialReader(const VDocument& i_rDocument)
-    : m_rDocument(i_rDocument), m_Template(i_rDocument.Template("Material"))
+    : m_rDocument(i_rDocument), m_Template(i_rDocument.Template("Material")),
+      m_pDefaults(new FbxSurfacePhong(std::string()))
 {
+	ReadValues(m_Template, *m_pDefaults);
 }
 
 std::string_view FbxFormat::VMaterialReader::ShadingModel(const VObject& i_rObject) const
@@ -114,7 +116,9 @@ std::unique_ptr<fbxsdk::FbxSurfaceMaterial> FbxFormat::VMaterialReader::ReadMate
 		pMaterial.reset(new FbxSurfaceLambert(std::move(name)));
 	else
 		return std::unique_ptr<FbxSurfaceMaterial>(new FbxSurfaceMaterial(std::move(name)));
-	ReadValues(m_Template, *pMaterial);
+	ForEachProperty(*pMaterial,
+	    [this](const auto& i_rEntry, auto& io_rOf)
+	    { (io_rOf.*i_rEntry.m_pMember).m_Value = (*m_pDefaults.*i_rEntry.m_pMember).m_Value; });
 	ReadValues(i_rObject.m_Element, *pMaterial);
 	return pMaterial;
 }

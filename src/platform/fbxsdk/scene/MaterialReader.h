@@ -28,6 +28,8 @@ private:
 
 	const VDocument& m_rDocument;
 	VElementIndex m_Template;
+	/// With the template's values, which are read once: they may be as many as the materials.
+	std::unique_ptr<fbxsdk::FbxSurfacePhong> m_pDefaults;
 };
 
 } // namespace FbxFormat

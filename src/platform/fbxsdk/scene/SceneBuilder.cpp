@@ -90,6 +90,7 @@ FbxFormat::VImportResult FbxFormat::VSceneBuilder::Build(
 	BuildEmpty();
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
 	rContent.m_Bytes = std::move(i_Bytes);
+	rContent.m_Budget = {Limits::DecodedBytes(rContent.m_Bytes.View().size())};
 	VImportResult result;
 	rContent.m_Tree.Read(rContent.m_Bytes.View(), i_rKind);
 	if (IsEncrypted(rContent.m_Tree))
@@ -247,13 +248,15 @@ void FbxFormat::VSceneBuilder::Connect()
 		    && seen.emplace(rConnection.m_Child, rConnection.m_Parent, rConnection.m_Property).second)
 			ConnectParts(rChild, rParent, rConnection.m_Property);
 	}
-	// In the order of the file: nodes may share materials.
+	// In the order of the file: nodes may share materials. A mesh that nodes share has its textures in the first.
+	std::set<const fbxsdk::FbxMesh*> looked;
 	for (const auto& pNode : rContent.m_Nodes)
 		if (const auto found = m_TexturesOfNodes.find(pNode.get()); found != m_TexturesOfNodes.end())
 		{
 			const fbxsdk::FbxNode::VData& rData = *pNode->m_pData;
-			ConnectLegacyTextures(rData.m_pMesh ? rData.m_pMesh->m_Record : VArraySource(), pNode->GetName(),
-			    found->second, rData.m_Materials);
+			const bool bFirst = rData.m_pMesh && looked.insert(rData.m_pMesh).second;
+			ConnectLegacyTextures(
+			    bFirst ? rData.m_pMesh->m_Record : VArraySource(), pNode->GetName(), found->second, rData.m_Materials);
 		}
 	if (m_SecondParents > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
