@@ -36,11 +36,6 @@ std::size_t Times(std::size_t i_Count)
 }
 
 /// Every byte; under the sanitizers, which take twenty times as long, only if more mutations are asked for too.
-#if defined(__has_feature)
-#if __has_feature(address_sanitizer)
-#define RETARGET_SANITIZED
-#endif
-#endif
 #ifdef RETARGET_SANITIZED
 const std::size_t c_Step = c_pTimes ? 1 : 11;
 #else

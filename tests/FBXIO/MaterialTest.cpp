@@ -3,6 +3,7 @@
 #include "MeshFile.h"
 #include "TestLog.h"
 
+#include <QBuffer>
 #include <QImage>
 
 #include <gtest/gtest.h>
@@ -153,7 +154,27 @@ TEST_P(Material, PicturesAreBounded)
 {
 	std::ofstream(Path("huge.ppm"), std::ios::binary) << "P6 20000 20000 255\n";
 	EXPECT_EQ(Read({{"lambert", {}, Path("huge.ppm"), ""}}).at(0).m_pTexture, nullptr);
-	EXPECT_EQ(m_Failed, (std::vector<std::string>{"Failed to load " + Path("huge.ppm")}));
+	EXPECT_EQ(m_Failed,
+	    (std::vector<std::string>{"Failed to load " + Path("huge.ppm")
+	        + ": its 20000 by 20000 points, or all pictures of the FBX file together, are too large"}));
+	// Scans that cost as much as the picture, however small they are.
+	QBuffer buffer;
+	QImage(3, 1, QImage::Format_RGB32).save(&buffer, "JPG");
+	for (const int scans : {0, 100})
+	{
+		std::ofstream(Path("scans.jpg"), std::ios::binary)
+		    << (buffer.data() + QByteArray("\xff\xda").repeated(scans)).toStdString();
+		EXPECT_EQ(Read({{"lambert", {}, Path("scans.jpg"), ""}}).at(0).m_pTexture == nullptr, scans > 0);
+	}
+	// Together: two that are allowed, and a third that is not. Before version 7 the first is that of all materials.
+	std::vector<VTestMaterial> materials;
+	for (const char* pName : {"a", "b", "c"})
+		materials.push_back({"lambert", {}, pName, "", "P6 4000 4000 255\n"});
+	m_Failed.clear();
+	Read(materials);
+	EXPECT_EQ(std::count_if(m_Failed.begin(), m_Failed.end(),
+	              [](const std::string& i_rText) { return i_rText.find("too large") != std::string::npos; }),
+	    GetParam().m_Version < 7000 ? 0 : 1);
 }
 
 TEST_P(Material, TexturesOfLayersGoToTheMaterialsOfTheirPolygons)
