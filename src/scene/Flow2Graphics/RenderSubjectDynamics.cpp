@@ -3,6 +3,7 @@
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "Flow2Graphics/SubjectShapes.h"
+#include "OrlexGraphics/HandleSize.h"
 #include "OrlexGraphics/MeshFile.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SphereHelper.h"
@@ -21,6 +22,10 @@ constexpr float c_AxesLength = 100.0f;
 constexpr float c_ArrowWidth = 5.0f;
 /// Of the shaft, and of the head.
 constexpr float c_ArrowLength = 50.0f;
+constexpr std::uint32_t c_ArrowSides = 16;
+/// Within a third of a pixel of the others as long as an arrow is thin: up to so many pixels from its middle.
+constexpr std::uint32_t c_ThinArrowSides = 6;
+constexpr float c_ThinArrow = 2.0f;
 const QVector4D c_CovarianceColour(0.5f, 0.5f, 0.5f, 0.5f);
 const std::array<QVector4D, 3> c_AxisColours{
     QVector4D(1.0f, 0.2f, 0.2f, 1.0f), QVector4D(0.2f, 1.0f, 0.2f, 1.0f), QVector4D(0.2f, 0.2f, 1.0f, 1.0f)};
@@ -70,6 +75,17 @@ std::array<std::array<QMatrix4x4, 2>, 3> MakeArrowParts()
 	return parts;
 }
 
+std::array<CoreGraphics::VShape, 2> MakeArrow(std::uint32_t i_Sides)
+{
+	return {CoreGraphics::MakeCylinder(i_Sides, true), CoreGraphics::MakeCone(i_Sides, true)};
+}
+
+bool IsThin(const CoreGraphics::VRenderContext& i_rContext, const VRenderSubjectData::VRotationTarget& i_rTarget)
+{
+	const std::optional<float> pixel = OrlexGraphics::PixelSizeAt(i_rContext, Translation(i_rTarget.m_Segment));
+	return pixel && c_ArrowWidth < c_ThinArrow * *pixel;
+}
+
 } // namespace
 
 const OrlexGraphics::VSubjectOptions& SubjectOptions(
@@ -96,8 +112,8 @@ VRenderSubjectDynamics::VRenderSubjectDynamics(CoreGraphics::VShaderLibrary& io_
     std::shared_ptr<OrlexGraphics::VSphereHelper> i_pSphereHelper)
     : m_pRegistry(std::move(i_pRegistry)), m_pSphereHelper(std::move(i_pSphereHelper)), m_SkinRenderer(io_rLibrary),
       m_SolidBox(CoreGraphics::MakeBox(false)), m_WireBox(CoreGraphics::MakeBox(true)),
-      m_Cylinder(CoreGraphics::MakeCylinder(16, true)), m_Cone(CoreGraphics::MakeCone(16, true)),
-      m_Sphere(CoreGraphics::MakeSphere(2)), m_AxesLines(CoreGraphics::MakeAxes(c_AxesLength)),
+      m_ArrowShapes{MakeArrow(c_ArrowSides), MakeArrow(c_ThinArrowSides)}, m_Sphere(CoreGraphics::MakeSphere(2)),
+      m_AxesLines(CoreGraphics::MakeAxes(c_AxesLength)),
       m_Bone(OrlexGraphics::ReadMeshFile(io_rLibrary, "tetra_stripe.fbx")),
       m_PositionTargets(io_rLibrary, "Target", "Colour", Blended(), "u_TargetPosAndSize", "u_ModelColour"),
       m_Covariances(io_rLibrary, "NonUniformSphere", "Covariance", Blended(), "u_ModelTransform", "u_ModelColour"),
@@ -253,20 +269,27 @@ void VRenderSubjectDynamics::RenderSpheres(const VWalk& i_rWalk,
 
 void VRenderSubjectDynamics::RenderRotationTargets(const VWalk& i_rWalk)
 {
+	for (const bool bThin : {false, true})
+		for (const std::size_t part : {0u, 1u})
+		{
+			CoreGraphics::VShape& rShape = m_ArrowShapes[bThin][part];
+			if (!Begin(i_rWalk, m_Arrows, rShape))
+				return;
+			for (const auto& rpSubject : i_rWalk.m_rSubjects)
+				for (const VRenderSubjectData::VRotationTarget& rTarget : rpSubject->m_RotationTargets)
+					if (IsThin(i_rWalk.m_rContext, rTarget) == bThin)
+						RenderArrows(i_rWalk, rTarget, part, rShape);
+		}
+}
+
+void VRenderSubjectDynamics::RenderArrows(const VWalk& i_rWalk, const VRenderSubjectData::VRotationTarget& i_rTarget,
+    std::size_t i_Part, CoreGraphics::VShape& io_rShape)
+{
 	// The shaft shows where the target is, the head where the segment is.
-	for (const std::size_t part : {0u, 1u})
-	{
-		CoreGraphics::VShape& rShape = part == 0 ? m_Cylinder : m_Cone;
-		if (!Begin(i_rWalk, m_Arrows, rShape))
-			return;
-		for (const auto& rpSubject : i_rWalk.m_rSubjects)
-			for (const VRenderSubjectData::VRotationTarget& rTarget : rpSubject->m_RotationTargets)
-				for (std::size_t axis = 0; axis < m_ArrowParts.size(); ++axis)
-					if (Place(i_rWalk, m_Arrows,
-					        (part == 0 ? rTarget.m_Target : rTarget.m_Segment) * m_ArrowParts[axis][part],
-					        c_AxisColours[axis], rTarget.m_Id))
-						i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, rShape.m_Indices);
-	}
+	const QMatrix4x4& rFrame = i_Part == 0 ? i_rTarget.m_Target : i_rTarget.m_Segment;
+	for (std::size_t axis = 0; axis < m_ArrowParts.size(); ++axis)
+		if (Place(i_rWalk, m_Arrows, rFrame * m_ArrowParts[axis][i_Part], c_AxisColours[axis], i_rTarget.m_Id))
+			i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, io_rShape.m_Indices);
 }
 
 void VRenderSubjectDynamics::RenderSkins(const VWalk& i_rWalk)

@@ -87,6 +87,8 @@ private:
 	void RenderBoxes(const VWalk& i_rWalk);
 	void RenderBones(const VWalk& i_rWalk);
 	void RenderRotationTargets(const VWalk& i_rWalk);
+	void RenderArrows(const VWalk& i_rWalk, const VRenderSubjectData::VRotationTarget& i_rTarget, std::size_t i_Part,
+	    CoreGraphics::VShape& io_rShape);
 	void RenderSpheres(const VWalk& i_rWalk, std::vector<VRenderSubjectData::VShape> VRenderSubjectData::*i_pSpheres,
 	    std::uint32_t i_LevelCap);
 	void RenderSkins(const VWalk& i_rWalk);
@@ -107,8 +109,8 @@ private:
 
 	CoreGraphics::VShape m_SolidBox;
 	CoreGraphics::VShape m_WireBox;
-	CoreGraphics::VShape m_Cylinder;
-	CoreGraphics::VShape m_Cone;
+	/// Shaft and head of an arrow, and with fewer sides those of a thin one.
+	std::array<std::array<CoreGraphics::VShape, 2>, 2> m_ArrowShapes;
 	CoreGraphics::VShape m_Sphere;
 	CoreGraphics::VShape m_AxesLines;
 	std::optional<CoreGraphics::VShape> m_Bone;

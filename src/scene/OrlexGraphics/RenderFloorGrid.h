@@ -62,6 +62,7 @@ private:
 	CoreGraphics::VVertexBuffer m_Square;
 	CoreGraphics::VUniform m_Extents{"u_Extents"};
 	CoreGraphics::VUniform m_GridSpacings{"u_GridSpacings"};
+	CoreGraphics::VUniform m_LevelBias{"u_LevelBias"};
 	CoreGraphics::VUniform m_Texture{"t_Texture"};
 	CoreGraphics::VUniform m_Colour{"u_colour"};
 	std::unique_ptr<CoreGraphics::VTexture> m_pTexture;

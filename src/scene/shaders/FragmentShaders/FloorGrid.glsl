@@ -5,15 +5,16 @@ const float c_AlphaFromAbove = 0.75;
 
 // Tiled, it is a grid of lines.
 uniform sampler2D t_Texture;
-// Of the large lines, and of the small ones.
-uniform vec2 u_GridSpacings;
+// Added to the level of its mipmaps.
+uniform float u_LevelBias;
 
-varying vec2 v_Floor;
+// In large tiles, and in small ones.
+varying vec4 v_Tiles;
 varying float v_CameraHeight;
 
 void main()
 {
-	float lines = texture2D(t_Texture, v_Floor / u_GridSpacings.x).r
-		+ 0.5 * texture2D(t_Texture, v_Floor / u_GridSpacings.y).r;
+	float lines = texture2D(t_Texture, v_Tiles.xy, u_LevelBias).r
+		+ 0.5 * texture2D(t_Texture, v_Tiles.zw, u_LevelBias).r;
 	gl_FragColor = vec4(c_Colour + lines, v_CameraHeight < 0.0 ? c_AlphaFromBelow : c_AlphaFromAbove);
 }
