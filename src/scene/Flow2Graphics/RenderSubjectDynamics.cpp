@@ -111,9 +111,9 @@ VRenderSubjectDynamics::VRenderSubjectDynamics(CoreGraphics::VShaderLibrary& io_
     std::shared_ptr<const OrlexGraphics::VSelectionRegistry> i_pRegistry,
     std::shared_ptr<OrlexGraphics::VSphereHelper> i_pSphereHelper)
     : m_pRegistry(std::move(i_pRegistry)), m_pSphereHelper(std::move(i_pSphereHelper)), m_SkinRenderer(io_rLibrary),
-      m_SolidBox(CoreGraphics::MakeBox(false)), m_WireBox(CoreGraphics::MakeBox(true)),
-      m_ArrowShapes{MakeArrow(c_ArrowSides), MakeArrow(c_ThinArrowSides)}, m_Sphere(CoreGraphics::MakeSphere(2)),
-      m_AxesLines(CoreGraphics::MakeAxes(c_AxesLength)),
+      m_SolidBox(CoreGraphics::MakeBox(false)),
+      m_WireBox(CoreGraphics::MakeBox(true)), m_ArrowShapes{MakeArrow(c_ArrowSides), MakeArrow(c_ThinArrowSides)},
+      m_Sphere(CoreGraphics::MakeSphere(2)), m_AxesLines(CoreGraphics::MakeAxes(c_AxesLength)),
       m_Bone(OrlexGraphics::ReadMeshFile(io_rLibrary, "tetra_stripe.fbx")),
       m_PositionTargets(io_rLibrary, "Target", "Colour", Blended(), "u_TargetPosAndSize", "u_ModelColour"),
       m_Covariances(io_rLibrary, "NonUniformSphere", "Covariance", Blended(), "u_ModelTransform", "u_ModelColour"),
