@@ -1,5 +1,7 @@
 #include "ViewFixture.h"
 
+#include "../WaitFor.h"
+
 #include "CoreGraphics/RenderContext.h"
 #include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/TesselInteractionMapper.h"
@@ -189,7 +191,7 @@ void VViewTest::Show(const std::shared_ptr<OrlexGraphics::VOrlexScene>& i_rpScen
 
 bool VViewTest::Until(const std::function<bool()>& i_rCondition)
 {
-	return QTest::qWaitFor(i_rCondition, 10000);
+	return WaitFor(i_rCondition, 10000);
 }
 
 void VViewTest::Mouse(QEvent::Type i_Type, const QPoint& i_rPos, Qt::MouseButton i_Button, Qt::MouseButtons i_Buttons,

@@ -66,17 +66,17 @@ template <>
 inline constexpr auto c_Enumeration<EColourNew> = VEnumeration<EColourNew, 3>(
     "EColour", "", {{EColourNew::EBlue, "Blue"}, {EColourNew::EGreen, "Green"}, {EColourNew::ERed, "Red"}});
 template <>
-inline constexpr auto c_Fields<VPartOld> = std::tuple(
+inline constexpr auto c_Fields<VPartOld> = Fields(
     VField("Name", &VPartOld::m_Name), VField("Length", &VPartOld::m_Length));
 template <>
-inline constexpr auto c_Fields<VPartNew> = std::tuple(VField("Tags", &VPartNew::m_Tags),
+inline constexpr auto c_Fields<VPartNew> = Fields(VField("Tags", &VPartNew::m_Tags),
     VField("Name", &VPartNew::m_Name), VField("Flags", &VPartNew::m_Flags), VField("Place", &VPartNew::m_Place),
     VField("Length", &VPartNew::m_Length), VField("Curve", &VPartNew::m_Curve));
 template <>
-inline constexpr auto c_Fields<VOld> = std::tuple(
+inline constexpr auto c_Fields<VOld> = Fields(
     VField("Id", &VOld::m_Id), VField("Parts", &VOld::m_Parts), VField("Colour", &VOld::m_Colour));
 template <>
-inline constexpr auto c_Fields<VNew> = std::tuple(VField("Parts", &VNew::m_Parts), VField("Colour", &VNew::m_Colour),
+inline constexpr auto c_Fields<VNew> = Fields(VField("Parts", &VNew::m_Parts), VField("Colour", &VNew::m_Colour),
     VField("Id", &VNew::m_Id), VField("Main", &VNew::m_Main));
 
 } // namespace CoreOrlexTypes

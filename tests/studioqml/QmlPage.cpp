@@ -1,5 +1,7 @@
 #include "QmlPage.h"
 
+#include "../WaitFor.h"
+
 #include <gtest/gtest.h>
 
 #include <QApplication>
@@ -44,7 +46,7 @@ QQuickItem* Find(QQuickItem* i_pItem, const QString& i_rObjectName, bool i_bVisi
 
 bool Eventually(const std::function<bool()>& i_rCondition)
 {
-	return QTest::qWaitFor(i_rCondition, 5000);
+	return WaitFor(i_rCondition, 5000);
 }
 
 VQmlPage::VQmlPage()

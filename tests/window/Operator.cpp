@@ -1,5 +1,7 @@
 #include "Operator.h"
 
+#include "../WaitFor.h"
+
 #include <gtest/gtest.h>
 
 #include <QApplication>
@@ -42,7 +44,7 @@ QQuickItem* Top(QQuickItem* i_pItem)
 
 bool Eventually(const std::function<bool()>& i_rCondition)
 {
-	return QTest::qWaitFor(i_rCondition, 60000);
+	return WaitFor(i_rCondition, 60000);
 }
 
 VOperator::VOperator(QWidget& i_rWindow, QQuickWidget& i_rPanel) : m_rWindow(i_rWindow), m_rPanel(i_rPanel) {}
@@ -83,14 +85,15 @@ void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers)
 {
 	const QQuickItem* const pItem = Item(i_rName);
 	ASSERT_TRUE(pItem && pItem->isEnabled() && pItem->isVisible()) << i_rName.toStdString();
+	const auto middle = [&] { return pItem->mapToScene({pItem->width() / 2, pItem->height() / 2}).toPoint(); };
 	// Not while the layout still moves it.
-	QPoint place(-1, -1);
+	QPoint place;
 	ASSERT_TRUE(Eventually(
 	    [&]
 	    {
-		    const QPoint now = pItem->mapToScene({pItem->width() / 2, pItem->height() / 2}).toPoint();
+		    place = middle();
 		    WaitForDrawing();
-		    return std::exchange(place, now) == now;
+		    return middle() == place;
 	    }));
 	ASSERT_TRUE(m_rPanel.rect().contains(place)) << i_rName.toStdString();
 	const QPoint inWindow = m_rPanel.mapTo(&m_rWindow, place);

@@ -43,7 +43,7 @@ bool Compare(const T& i_rLeft, const T& i_rRight, std::string& io_rPath)
 			io_rPath.resize(size);
 			return true;
 		};
-		return std::apply([&](const auto&... i_rField) { return (compareField(i_rField) && ...); }, c_Fields<T>);
+		return c_Fields<T>([&](const auto&... i_rField) { return (compareField(i_rField) && ...); });
 	}
 	else if constexpr (std::ranges::range<T> && !std::is_same_v<T, std::string>)
 		return CompareItems(i_rLeft, i_rRight, io_rPath);

@@ -10,7 +10,6 @@
 #include <cstddef>
 #include <optional>
 #include <string_view>
-#include <tuple>
 #include <type_traits>
 
 /// The one description of the subject types: keys, members and what they mean, in declared order. Equality, the text
@@ -58,7 +57,14 @@ struct VEnumeration
 	std::array<VEnumerator<E>, c_Count> Enumerators;
 };
 
-/// A tuple of VField for each record type.
+/// A list of fields in their order: calls what it is given with all of them. Lighter on compilers than a tuple.
+template <typename... TField>
+constexpr auto Fields(TField... i_Field)
+{
+	return [i_Field...](auto&& i_rCall) { return i_rCall(i_Field...); };
+}
+
+/// The Fields of each record type.
 template <typename T>
 inline constexpr auto c_Fields = nullptr;
 
@@ -76,11 +82,11 @@ concept CEnumeration = std::is_enum_v<E> && !std::is_same_v<decltype(c_Enumerati
 template <CRecord T, typename TVisitor>
 constexpr void ForEachField(TVisitor&& i_rVisitor)
 {
-	std::apply([&](const auto&... i_rField) { (i_rVisitor(i_rField), ...); }, c_Fields<T>);
+	c_Fields<T>([&](const auto&... i_rField) { (i_rVisitor(i_rField), ...); });
 }
 
 template <CRecord T>
-inline constexpr std::size_t c_FieldCount = std::tuple_size_v<std::remove_const_t<decltype(c_Fields<T>)>>;
+inline constexpr std::size_t c_FieldCount = c_Fields<T>([](const auto&... i_rField) { return sizeof...(i_rField); });
 
 /// Empty for a value outside the enumeration.
 template <CEnumeration E>
@@ -102,7 +108,7 @@ constexpr std::optional<E> EnumeratorFromName(std::string_view i_Name)
 }
 
 template <>
-inline constexpr auto c_Fields<VColour> = std::tuple(VField("Red", &VColour::m_Red), VField("Green", &VColour::m_Green),
+inline constexpr auto c_Fields<VColour> = Fields(VField("Red", &VColour::m_Red), VField("Green", &VColour::m_Green),
     VField("Blue", &VColour::m_Blue), VField("Alpha", &VColour::m_Alpha));
 
 } // namespace CoreOrlexTypes
@@ -115,12 +121,12 @@ namespace CoreOrlexTypes
 {
 
 template <>
-inline constexpr auto c_Fields<VSubjectRecord> = std::tuple(
+inline constexpr auto c_Fields<VSubjectRecord> = Fields(
     VField("SubjectParametrised", &VSubjectRecord::m_SubjectParametrised, "The editable subject."),
     VField("SubjectApplicationData", &VSubjectRecord::m_SubjectApplicationData, "What draws the subject."));
 
 template <>
-inline constexpr auto c_Fields<VTextHeader> = std::tuple(
+inline constexpr auto c_Fields<VTextHeader> = Fields(
     VField("Version", &VTextHeader::m_Version, "Major, minor and patch version of what follows."),
     VField("Schema", &VTextHeader::m_Schema, "Name of the schema of what follows."));
 

@@ -6,7 +6,7 @@ namespace CoreOrlexTypes
 {
 
 template <>
-inline constexpr auto c_Fields<VSubject::VJoint> = std::tuple(VField("Name", &VSubject::VJoint::m_Name, "Joint name."),
+inline constexpr auto c_Fields<VSubject::VJoint> = Fields(VField("Name", &VSubject::VJoint::m_Name, "Joint name."),
     VField("JointType", &VSubject::VJoint::m_JointType),
     VField("JointOrientation", &VSubject::VJoint::m_JointOrientation, "Orientation of the joint axes, angle-axis."),
     VField("Covariance", &VSubject::VJoint::m_Covariance), VField("Mean", &VSubject::VJoint::m_Mean),
@@ -15,7 +15,7 @@ inline constexpr auto c_Fields<VSubject::VJoint> = std::tuple(VField("Name", &VS
     VField("RangeMatrix", &VSubject::VJoint::m_RangeMatrix, "Covariance-like matrix that defines the joint ranges."));
 
 template <>
-inline constexpr auto c_Fields<VSubject::VSegment> = std::tuple(
+inline constexpr auto c_Fields<VSubject::VSegment> = Fields(
     VField("Name", &VSubject::VSegment::m_Name, "Segment name."),
     VField("SegmentIndex", &VSubject::VSegment::m_SegmentIndex, "Index (not id) of this segment within VSubject."),
     VField(
@@ -34,18 +34,18 @@ inline constexpr auto c_Fields<VSubject::VSegment> = std::tuple(
     VField("Joint", &VSubject::VSegment::m_Joint, "The joint that connects this segment to its parent."));
 
 template <>
-inline constexpr auto c_Fields<VSubject::VMarker> = std::tuple(
+inline constexpr auto c_Fields<VSubject::VMarker> = Fields(
     VField("Name", &VSubject::VMarker::m_Name, "Marker name."),
     VField("MarkerId", &VSubject::VMarker::m_MarkerId, "Numeric id, unique in the subject."),
     VField("Radius", &VSubject::VMarker::m_Radius, "Marker radius."), VField("Missing", &VSubject::VMarker::m_Missing),
     VField("ViewAngle", &VSubject::VMarker::m_ViewAngle));
 
 template <>
-inline constexpr auto c_Fields<VSubject::VRotation> = std::tuple(
+inline constexpr auto c_Fields<VSubject::VRotation> = Fields(
     VField("Name", &VSubject::VRotation::m_Name), VField("RotationId", &VSubject::VRotation::m_RotationId));
 
 template <>
-inline constexpr auto c_Fields<VSubject::VTarget> = std::tuple(VField("Type", &VSubject::VTarget::m_Type),
+inline constexpr auto c_Fields<VSubject::VTarget> = Fields(VField("Type", &VSubject::VTarget::m_Type),
     VField("Weight", &VSubject::VTarget::m_Weight, "The amount of influence the target has in the solution."),
     VField("RotationCalibrationBehaviour", &VSubject::VTarget::m_RotationCalibrationBehaviour),
     VField("RotationTargetOrientation", &VSubject::VTarget::m_RotationTargetOrientation,
@@ -59,7 +59,7 @@ inline constexpr auto c_Fields<VSubject::VTarget> = std::tuple(VField("Type", &V
     VField("ViewNormals", &VSubject::VTarget::m_ViewNormals, "Direction the target faces, in the segment's frame."));
 
 template <>
-inline constexpr auto c_Fields<VSubject> = std::tuple(VField("Name", &VSubject::m_Name, "Subject name."),
+inline constexpr auto c_Fields<VSubject> = Fields(VField("Name", &VSubject::m_Name, "Subject name."),
     VField("SubjectId", &VSubject::m_SubjectId, "Numeric subject id."),
     VField("Segments", &VSubject::m_Segments, "The segment tree, parents first."),
     VField("Markers", &VSubject::m_Markers), VField("Rotations", &VSubject::m_Rotations, "Rotation observations."),

@@ -45,17 +45,17 @@ inline constexpr auto c_Enumeration<VSubjectApplicationData::VTarget::EDrawStyle
             {VSubjectApplicationData::VTarget::EDrawStyleBoneLines, "DrawStyleBoneLines"}});
 
 template <>
-inline constexpr auto c_Fields<VSubjectApplicationData::VMarker> = std::tuple(
+inline constexpr auto c_Fields<VSubjectApplicationData::VMarker> = Fields(
     VField("Colour", &VSubjectApplicationData::VMarker::m_Colour));
 
 template <>
-inline constexpr auto c_Fields<VSubjectApplicationData::VJoint> = std::tuple(
+inline constexpr auto c_Fields<VSubjectApplicationData::VJoint> = Fields(
     VField("EulerOrder", &VSubjectApplicationData::VJoint::m_EulerOrder, "The order used to display the state."),
     VField("Labels", &VSubjectApplicationData::VJoint::m_Labels, "A list of labels of the state components."),
     VField("Signs", &VSubjectApplicationData::VJoint::m_Signs, "A list of + or - for the state components."));
 
 template <>
-inline constexpr auto c_Fields<VSubjectApplicationData::VSegment> = std::tuple(
+inline constexpr auto c_Fields<VSubjectApplicationData::VSegment> = Fields(
     VField("Colour", &VSubjectApplicationData::VSegment::m_Colour),
     VField("Context", &VSubjectApplicationData::VSegment::m_Context,
         "Context of the segment, for instance left or right."),
@@ -71,7 +71,7 @@ inline constexpr auto c_Fields<VSubjectApplicationData::VSegment> = std::tuple(
     VField("Joint", &VSubjectApplicationData::VSegment::m_Joint));
 
 template <>
-inline constexpr auto c_Fields<VSubjectApplicationData::VStick> = std::tuple(
+inline constexpr auto c_Fields<VSubjectApplicationData::VStick> = Fields(
     VField("MarkerIndexA", &VSubjectApplicationData::VStick::m_MarkerIndexA,
         "Index (not id) of first marker within the associated VSubject."),
     VField("ColourA", &VSubjectApplicationData::VStick::m_ColourA),
@@ -80,7 +80,7 @@ inline constexpr auto c_Fields<VSubjectApplicationData::VStick> = std::tuple(
     VField("ColourB", &VSubjectApplicationData::VStick::m_ColourB));
 
 template <>
-inline constexpr auto c_Fields<VSubjectApplicationData::VTarget> = std::tuple(
+inline constexpr auto c_Fields<VSubjectApplicationData::VTarget> = Fields(
     VField("Colour", &VSubjectApplicationData::VTarget::m_Colour),
     VField("DrawStyle", &VSubjectApplicationData::VTarget::m_DrawStyle),
     VField("FillGaps", &VSubjectApplicationData::VTarget::m_FillGaps),
@@ -88,7 +88,7 @@ inline constexpr auto c_Fields<VSubjectApplicationData::VTarget> = std::tuple(
     VField("Visible", &VSubjectApplicationData::VTarget::m_Visible));
 
 template <>
-inline constexpr auto c_Fields<VSubjectApplicationData> = std::tuple(
+inline constexpr auto c_Fields<VSubjectApplicationData> = Fields(
     VField("SubjectId", &VSubjectApplicationData::m_SubjectId, "The subject it belongs to."),
     VField("Colour", &VSubjectApplicationData::m_Colour, "Colour of the subject."),
     VField("Markers", &VSubjectApplicationData::m_Markers, "One per subject marker."),

@@ -86,7 +86,7 @@ inline constexpr auto c_Enumeration<VSubjectParametrised::VStaticParameter::EQua
             {VSubjectParametrised::VStaticParameter::EQuantityTime, "QuantityTime"}});
 
 template <>
-inline constexpr auto c_Fields<VSubjectParametrised::VStaticParameter> = std::tuple(
+inline constexpr auto c_Fields<VSubjectParametrised::VStaticParameter> = Fields(
     VField("Advanced", &VSubjectParametrised::VStaticParameter::m_Advanced, "Shown only among advanced parameters."),
     VField("Visible", &VSubjectParametrised::VStaticParameter::m_Visible, "Shown to the user."),
     VField("ReadOnly", &VSubjectParametrised::VStaticParameter::m_ReadOnly, "Not editable."),
@@ -101,7 +101,7 @@ inline constexpr auto c_Fields<VSubjectParametrised::VStaticParameter> = std::tu
     VField("Quantity", &VSubjectParametrised::VStaticParameter::m_Quantity, "Unit class."));
 
 template <>
-inline constexpr auto c_Fields<VSubjectParametrised::VDynamicParameter> = std::tuple(
+inline constexpr auto c_Fields<VSubjectParametrised::VDynamicParameter> = Fields(
     VField("Name", &VSubjectParametrised::VDynamicParameter::m_Name),
     VField("Prior", &VSubjectParametrised::VDynamicParameter::m_Prior),
     VField("StandardDeviation", &VSubjectParametrised::VDynamicParameter::m_StandardDeviation),
@@ -109,7 +109,7 @@ inline constexpr auto c_Fields<VSubjectParametrised::VDynamicParameter> = std::t
     VField("Visible", &VSubjectParametrised::VDynamicParameter::m_Visible));
 
 template <>
-inline constexpr auto c_Fields<VSubjectParametrised::VJoint> = std::tuple(
+inline constexpr auto c_Fields<VSubjectParametrised::VJoint> = Fields(
     VField("Name", &VSubjectParametrised::VJoint::m_Name, "Joint name."),
     VField("JointType", &VSubjectParametrised::VJoint::m_JointType),
     VField("JointOrientation", &VSubjectParametrised::VJoint::m_JointOrientation,
@@ -130,7 +130,7 @@ inline constexpr auto c_Fields<VSubjectParametrised::VJoint> = std::tuple(
     VField("BindPose", &VSubjectParametrised::VJoint::m_BindPose, "Bind pose for retargeting"));
 
 template <>
-inline constexpr auto c_Fields<VSubjectParametrised::VSegment> = std::tuple(
+inline constexpr auto c_Fields<VSubjectParametrised::VSegment> = Fields(
     VField("Name", &VSubjectParametrised::VSegment::m_Name, "Segment name."),
     VField("SegmentIndex", &VSubjectParametrised::VSegment::m_SegmentIndex,
         "Index (not id) of this segment within VSubject."),
@@ -156,7 +156,7 @@ inline constexpr auto c_Fields<VSubjectParametrised::VSegment> = std::tuple(
     VField("Bounds", &VSubjectParametrised::VSegment::m_Bounds, "Two corners of the box used to show the segment."));
 
 template <>
-inline constexpr auto c_Fields<VSubjectParametrised::VMarker> = std::tuple(
+inline constexpr auto c_Fields<VSubjectParametrised::VMarker> = Fields(
     VField("Name", &VSubjectParametrised::VMarker::m_Name, "Marker name."),
     VField("MarkerId", &VSubjectParametrised::VMarker::m_MarkerId, "Numeric id, unique in the subject."),
     VField("Missing", &VSubjectParametrised::VMarker::m_Missing),
@@ -165,12 +165,12 @@ inline constexpr auto c_Fields<VSubjectParametrised::VMarker> = std::tuple(
     VField("ViewAngle", &VSubjectParametrised::VMarker::m_ViewAngle));
 
 template <>
-inline constexpr auto c_Fields<VSubjectParametrised::VRotation> = std::tuple(
+inline constexpr auto c_Fields<VSubjectParametrised::VRotation> = Fields(
     VField("Name", &VSubjectParametrised::VRotation::m_Name),
     VField("RotationId", &VSubjectParametrised::VRotation::m_RotationId));
 
 template <>
-inline constexpr auto c_Fields<VSubjectParametrised::VTarget> = std::tuple(
+inline constexpr auto c_Fields<VSubjectParametrised::VTarget> = Fields(
     VField("Covariance", &VSubjectParametrised::VTarget::m_Covariance, "Uncertainty of the state."),
     VField("PlacementCovariance", &VSubjectParametrised::VTarget::m_PlacementCovariance),
     VField("MarkerIndices", &VSubjectParametrised::VTarget::m_MarkerIndices, "Indices into Markers."),
@@ -192,7 +192,7 @@ inline constexpr auto c_Fields<VSubjectParametrised::VTarget> = std::tuple(
     VField("NumberOfDegreesOfFreedom", &VSubjectParametrised::VTarget::m_NumberOfDegreesOfFreedom));
 
 template <>
-inline constexpr auto c_Fields<VSubjectParametrised> = std::tuple(
+inline constexpr auto c_Fields<VSubjectParametrised> = Fields(
     VField("Name", &VSubjectParametrised::m_Name, "Subject name."),
     VField("Model", &VSubjectParametrised::m_Model, "Model name."),
     VField("ModelVersion", &VSubjectParametrised::m_ModelVersion, "Model version."),
