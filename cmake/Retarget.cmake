@@ -64,22 +64,22 @@ function(retarget_screen variable name size)
 	set(${variable} ${RETARGET_XVFB_RUN} -a -n ${display} -s "-screen 0 ${size}x24" PARENT_SCOPE)
 endfunction()
 
-# retarget_test(NAME [DISPLAY] SOURCES ... [OPTIMISED ...] LIBRARIES ...): a GoogleTest program; RETARGET_TEST_DATA is the
+# retarget_test(NAME [DISPLAY] [OPTIMISED] SOURCES ... LIBRARIES ...): a GoogleTest program; RETARGET_TEST_DATA is the
 # folder tests/data and RETARGET_SOURCE the root of the tree. With DISPLAY it runs on a screen of its own, drawn in
-# software. OPTIMISED are those of the sources that compute much themselves.
+# software. OPTIMISED is for tests that compute much themselves.
 function(retarget_test name)
-	cmake_parse_arguments(PARSE_ARGV 1 arg "DISPLAY" "" "SOURCES;OPTIMISED;LIBRARIES")
+	cmake_parse_arguments(PARSE_ARGV 1 arg "DISPLAY;OPTIMISED" "" "SOURCES;LIBRARIES")
 	add_executable(test_${name} ${arg_SOURCES} ${CMAKE_SOURCE_DIR}/tests/TestMain.cpp)
 	target_link_libraries(test_${name} PRIVATE ${arg_LIBRARIES} GTest::gtest)
 	target_compile_definitions(test_${name} PRIVATE RETARGET_TEST_DATA="${CMAKE_SOURCE_DIR}/tests/data"
 		RETARGET_SOURCE="${CMAKE_SOURCE_DIR}")
 	# Tests cost more to compile than to run: what they test is optimised, they are not, and a fuzzer has nothing to
 	# learn from their own code.
-	target_compile_options(test_${name} PRIVATE -O0)
 	if(arg_OPTIMISED)
 		# At -O1 g++ takes members of a variant for uninitialised.
-		set_source_files_properties(${arg_OPTIMISED} PROPERTIES SKIP_UNITY_BUILD_INCLUSION ON
-			COMPILE_OPTIONS "-O1;$<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>")
+		target_compile_options(test_${name} PRIVATE -O1 $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>)
+	else()
+		target_compile_options(test_${name} PRIVATE -O0)
 	endif()
 	if(RETARGET_SANITIZE MATCHES "fuzzer")
 		target_compile_options(test_${name} PRIVATE -fno-sanitize=fuzzer-no-link)

@@ -19,8 +19,8 @@ constexpr std::size_t SizeOfFields()
 	std::size_t end = 0;
 	const auto place = [&](std::size_t i_Size, std::size_t i_Alignment)
 	{ end = (end + i_Alignment - 1) / i_Alignment * i_Alignment + i_Size; };
-	c_Fields<T>([&]<typename... TMember>(const VField<T, TMember>&...)
-	    { (place(sizeof(TMember), alignof(TMember)), ...); });
+	c_Fields<T>(
+	    [&]<typename... TMember>(const VField<T, TMember>&...) { (place(sizeof(TMember), alignof(TMember)), ...); });
 	place(0, alignof(T));
 	return end;
 }

@@ -69,9 +69,9 @@ template <>
 inline constexpr auto c_Fields<VPartOld> = Fields(
     VField("Name", &VPartOld::m_Name), VField("Length", &VPartOld::m_Length));
 template <>
-inline constexpr auto c_Fields<VPartNew> = Fields(VField("Tags", &VPartNew::m_Tags),
-    VField("Name", &VPartNew::m_Name), VField("Flags", &VPartNew::m_Flags), VField("Place", &VPartNew::m_Place),
-    VField("Length", &VPartNew::m_Length), VField("Curve", &VPartNew::m_Curve));
+inline constexpr auto c_Fields<VPartNew> = Fields(VField("Tags", &VPartNew::m_Tags), VField("Name", &VPartNew::m_Name),
+    VField("Flags", &VPartNew::m_Flags), VField("Place", &VPartNew::m_Place), VField("Length", &VPartNew::m_Length),
+    VField("Curve", &VPartNew::m_Curve));
 template <>
 inline constexpr auto c_Fields<VOld> = Fields(
     VField("Id", &VOld::m_Id), VField("Parts", &VOld::m_Parts), VField("Colour", &VOld::m_Colour));

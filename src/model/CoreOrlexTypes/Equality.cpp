@@ -39,8 +39,8 @@ bool Equal(const std::vector<T>& i_rLeft, const std::vector<T>& i_rRight)
 template <CRecord T>
 bool Equal(const T& i_rLeft, const T& i_rRight)
 {
-	return c_Fields<T>([&](const auto&... i_rField)
-	    { return (Equal(i_rLeft.*i_rField.pMember, i_rRight.*i_rField.pMember) && ...); });
+	return c_Fields<T>(
+	    [&](const auto&... i_rField) { return (Equal(i_rLeft.*i_rField.pMember, i_rRight.*i_rField.pMember) && ...); });
 }
 
 } // namespace

@@ -34,8 +34,7 @@ inline constexpr auto c_Fields<VSubject::VSegment> = Fields(
     VField("Joint", &VSubject::VSegment::m_Joint, "The joint that connects this segment to its parent."));
 
 template <>
-inline constexpr auto c_Fields<VSubject::VMarker> = Fields(
-    VField("Name", &VSubject::VMarker::m_Name, "Marker name."),
+inline constexpr auto c_Fields<VSubject::VMarker> = Fields(VField("Name", &VSubject::VMarker::m_Name, "Marker name."),
     VField("MarkerId", &VSubject::VMarker::m_MarkerId, "Numeric id, unique in the subject."),
     VField("Radius", &VSubject::VMarker::m_Radius, "Marker radius."), VField("Missing", &VSubject::VMarker::m_Missing),
     VField("ViewAngle", &VSubject::VMarker::m_ViewAngle));
