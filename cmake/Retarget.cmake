@@ -65,24 +65,20 @@ function(retarget_screen variable name size)
 endfunction()
 
 # retarget_test(NAME [DISPLAY] [OPTIMISED] SOURCES ... LIBRARIES ...): a GoogleTest program; RETARGET_TEST_DATA is the
-# folder tests/data and RETARGET_SOURCE the root of the tree. With DISPLAY it runs on a screen of its own, drawn in
-# software. OPTIMISED is for tests that compute much themselves.
+# folder tests/data, RETARGET_SOURCE the root of the tree, and RETARGET_SANITIZED is there under sanitizers. With DISPLAY
+# it runs on a screen of its own, drawn in software. OPTIMISED is for tests that compute much themselves.
 function(retarget_test name)
 	cmake_parse_arguments(PARSE_ARGV 1 arg "DISPLAY;OPTIMISED" "" "SOURCES;LIBRARIES")
-	add_executable(test_${name} ${arg_SOURCES} ${CMAKE_SOURCE_DIR}/tests/TestMain.cpp)
-	target_link_libraries(test_${name} PRIVATE ${arg_LIBRARIES} GTest::gtest)
+	add_executable(test_${name} ${arg_SOURCES})
+	target_link_libraries(test_${name} PRIVATE ${arg_LIBRARIES} TestMain)
 	target_compile_definitions(test_${name} PRIVATE RETARGET_TEST_DATA="${CMAKE_SOURCE_DIR}/tests/data"
 		RETARGET_SOURCE="${CMAKE_SOURCE_DIR}")
-	# Tests cost more to compile than to run: what they test is optimised, they are not, and a fuzzer has nothing to
-	# learn from their own code.
+	target_compile_options(test_${name} PRIVATE ${RETARGET_TEST_OPTIONS})
 	if(arg_OPTIMISED)
 		# At -O1 g++ takes members of a variant for uninitialised.
 		target_compile_options(test_${name} PRIVATE -O1 $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>)
 	else()
-		target_compile_options(test_${name} PRIVATE -O0)
-	endif()
-	if(RETARGET_SANITIZE MATCHES "fuzzer")
-		target_compile_options(test_${name} PRIVATE -fno-sanitize=fuzzer-no-link)
+		target_precompile_headers(test_${name} REUSE_FROM TestMain)
 	endif()
 	if(NOT arg_DISPLAY)
 		add_test(NAME ${name} COMMAND test_${name})

@@ -24,11 +24,6 @@ using namespace CoreOrlexTypesUtils::RigidBodyUtils;
 using CoreOrlexTypes::VSubjectApplicationData;
 
 /// Sanitizers look at each; without them a part is enough.
-#if defined(__has_feature)
-#if __has_feature(address_sanitizer)
-#define RETARGET_SANITIZED
-#endif
-#endif
 #ifdef RETARGET_SANITIZED
 constexpr int c_SubjectCount = 100000;
 #else

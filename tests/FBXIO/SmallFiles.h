@@ -5,12 +5,6 @@
 #include <functional>
 #include <random>
 
-#if defined(__has_feature)
-#if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer)
-#define RETARGET_SANITIZED
-#endif
-#endif
-
 /// Small files with all that the reader knows, and ways to damage them.
 namespace FbxTest
 {

@@ -12,8 +12,13 @@ namespace
 
 constexpr double c_NaN = std::numeric_limits<double>::quiet_NaN();
 
-template <int t_Rows, int t_Columns>
-using VRows = Eigen::Matrix<double, t_Rows, t_Columns, t_Columns == 1 ? Eigen::ColMajor : Eigen::RowMajor>;
+/// Of sizes that are not known to the compiler, which would be busy with each of them for seconds.
+template <typename TEntries>
+Eigen::MatrixXd Rows(int i_Rows, int i_Columns, const TEntries& i_rEntries)
+{
+	using VRowMajor = Eigen::Matrix<double, Eigen::Dynamic, Eigen::Dynamic, Eigen::RowMajor>;
+	return Eigen::Map<const VRowMajor>(i_rEntries.data(), i_Rows, i_Columns);
+}
 
 /// What the library writes to the standard error stream while i_rAction runs.
 template <typename TAction>
@@ -24,22 +29,25 @@ std::string Reported(const TAction& i_rAction)
 	return testing::internal::GetCapturedStderr();
 }
 
+void ExpectFactors(const Eigen::MatrixXd& m, const Eigen::MatrixXd& u, const Eigen::VectorXd& w,
+    const Eigen::MatrixXd& vt, const Eigen::MatrixXd& inverse)
+{
+	const Eigen::MatrixXd one = Eigen::MatrixXd::Identity(w.size(), w.size());
+	EXPECT_LT((u * w.asDiagonal() * vt - m).cwiseAbs().maxCoeff(), 1e-13);
+	EXPECT_LT((u.transpose() * u - one).norm(), 1e-13);
+	EXPECT_LT((vt * vt.transpose() - one).norm(), 1e-13);
+	EXPECT_LT((w - Eigen::JacobiSVD<Eigen::MatrixXd>(m).singularValues()).norm(), 1e-13);
+	EXPECT_LT((m * inverse * m - m).cwiseAbs().maxCoeff(), 1e-12);
+}
+
 template <int t_Rows, int t_Columns>
 void ExpectDecomposes(const std::array<double, std::size_t(t_Rows* t_Columns)>& i_rM)
 {
-	constexpr int c_Smaller = std::min(t_Rows, t_Columns);
+	const int smaller = std::min(t_Rows, t_Columns);
 	const fnl_svd_fixed<t_Rows, t_Columns> svd(i_rM);
-	const VRows<t_Rows, t_Columns> m(i_rM.data());
-	const VRows<t_Rows, c_Smaller> u(svd.U().data());
-	const VRows<c_Smaller, t_Columns> vt(svd.Vt().data());
-	const Eigen::Map<const Eigen::Vector<double, c_Smaller>> w(svd.W().data());
-	EXPECT_LT((u * w.asDiagonal() * vt - m).cwiseAbs().maxCoeff(), 1e-13);
-	EXPECT_LT((u.transpose() * u - Eigen::Matrix<double, c_Smaller, c_Smaller>::Identity()).norm(), 1e-13);
-	EXPECT_LT((vt * vt.transpose() - Eigen::Matrix<double, c_Smaller, c_Smaller>::Identity()).norm(), 1e-13);
 	EXPECT_TRUE(std::is_sorted(svd.W().rbegin(), svd.W().rend()));
-	EXPECT_LT((w - Eigen::JacobiSVD<Eigen::MatrixXd>(m).singularValues()).norm(), 1e-13);
-	const VRows<t_Columns, t_Rows> inverse(svd.Inverse(1e-12).data());
-	EXPECT_LT((m * inverse * m - m).cwiseAbs().maxCoeff(), 1e-12);
+	ExpectFactors(Rows(t_Rows, t_Columns, i_rM), Rows(t_Rows, smaller, svd.U()), Rows(smaller, 1, svd.W()),
+	    Rows(smaller, t_Columns, svd.Vt()), Rows(t_Columns, t_Rows, svd.Inverse(1e-12)));
 }
 
 TEST(SingularValues, FactorsGiveTheMatrixBack)
@@ -105,26 +113,26 @@ TEST(Eigensystem, FixedAndGeneralFormsRebuildTheMatrix)
 	std::normal_distribution<double> value;
 	for (int i = 0; i < 50; ++i)
 	{
-		VRows<6, 6> matrix;
-		for (double& rEntry : matrix.reshaped())
-			rEntry = value(random);
-		matrix = (matrix + matrix.transpose()).eval();
 		std::array<double, 36> entries;
-		VRows<6, 6>::Map(entries.data()) = matrix;
+		for (std::size_t row = 0; row < 6; ++row)
+			for (std::size_t column = 0; column <= row; ++column)
+				entries[6 * row + column] = entries[6 * column + row] = value(random);
+		const Eigen::MatrixXd matrix = Rows(6, 6, entries);
+		const auto rebuilt = [](const auto& i_rVectors, const auto& i_rValues) -> Eigen::MatrixXd
+		{
+			const Eigen::MatrixXd vectors = Rows(6, 6, i_rVectors);
+			const Eigen::VectorXd values = Rows(6, 1, i_rValues);
+			return vectors.transpose() * values.asDiagonal() * vectors;
+		};
 
 		const fnl_symmetric_eigensystem<6> fixed(entries);
-		const VRows<6, 6> vectors(fixed.Vectors().data());
-		const Eigen::Vector<double, 6> values(fixed.Values().data());
-		EXPECT_LT((vectors.transpose() * values.asDiagonal() * vectors - matrix).norm(), 1e-13);
+		EXPECT_LT((rebuilt(fixed.Vectors(), fixed.Values()) - matrix).norm(), 1e-13);
 		EXPECT_TRUE(std::is_sorted(fixed.Values().begin(), fixed.Values().end()));
 
 		std::vector<double> generalVectors;
 		std::vector<double> generalValues;
 		ASSERT_TRUE(fnl_symmetric_eigensystem_compute({entries.begin(), entries.end()}, generalVectors, generalValues));
-		const VRows<6, 6> v(generalVectors.data());
-		EXPECT_LT(
-		    (v.transpose() * Eigen::Map<Eigen::VectorXd>(generalValues.data(), 6).asDiagonal() * v - matrix).norm(),
-		    1e-13);
+		EXPECT_LT((rebuilt(generalVectors, generalValues) - matrix).norm(), 1e-13);
 	}
 }
 
