@@ -3,6 +3,7 @@
 #include "TesselPluginInterface/IQuickEngine.h"
 
 #include <QApplication>
+#include <QDateTime>
 #include <QFile>
 #include <QKeyEvent>
 #include <QQmlEngine>
@@ -39,7 +40,11 @@ protected:
 		QFile file(m_Folder.filePath("Panel.qml"));
 		ASSERT_TRUE(file.open(QIODevice::WriteOnly));
 		file.write(i_pQml);
+		file.flush();
+		// Qt keeps what it compiled as long as a file's time is the same, which it may be for some milliseconds.
+		file.setFileTime(QDateTime::fromSecsSinceEpoch(++m_Seconds), QFileDevice::FileModificationTime);
 	}
+	qint64 m_Seconds = 1000000000;
 
 	static void SetUpTestSuite()
 	{
