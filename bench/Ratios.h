@@ -9,8 +9,8 @@
 #include <vector>
 
 /// Runs all benchmarks of a program and prints ratios between their rows behind the table. A row's time is the least of
-/// its repetitions' processor times: on a machine that does other work too, the rest is noise. Of a row that is
-/// measured in real time, since it runs on several threads, it is the least of these.
+/// its repetitions' processor times: on a machine that does other work too, the rest is noise. Of a row whose work runs
+/// on several threads, so that its name tells another kind of time, it is the least of the real times.
 namespace Ratios
 {
 

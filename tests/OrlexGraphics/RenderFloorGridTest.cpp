@@ -102,6 +102,47 @@ TEST_P(RenderFloor, IsOpaqueOrSeenThroughFromEitherSide)
 	}
 }
 
+TEST_P(RenderFloor, LinesCountAsMuchAsTheyCover)
+{
+	// Lines are 4 mm and 2 mm wide.
+	m_pFloor->SetFloor(VFloor{-100000, -100000, 100000, 100000, 1024.0f, 2});
+	m_Options.m_bFloorGridIsTranslucent = false;
+	struct VRow
+	{
+		float m_Scale;
+		/// Of a pixel beside the line at 1024 mm.
+		float m_Large;
+		float m_Small;
+	};
+	for (const bool bSoftware : {true, false})
+	{
+		m_Render.m_bSoftware = bSoftware;
+		for (const bool bYUp : {false, true})
+		{
+			m_Camera.m_bYUp = bYUp;
+			for (const VRow& rRow :
+			    {VRow{4.0f, 0.5f, 0.25f}, {8.0f, 0.25f, 0.125f}, {16.0f, 0.125f, 0.0625f}, {32.0f, 0.0625f, 0.03125f}})
+			{
+				SCOPED_TRACE(testing::Message() << bSoftware << bYUp << rRow.m_Scale);
+				m_Camera.m_OrthographicScale = rRow.m_Scale;
+				Draw(*m_pFloor, EPassOpaque);
+				const float grey = 255.0f * (0.2f + rRow.m_Large + 0.5f * rRow.m_Small);
+				// A line across and one up; the others are far.
+				const int line = static_cast<int>(1024.0f / rRow.m_Scale);
+				const int beside = std::max(static_cast<int>(256.0f / rRow.m_Scale), 4);
+				for (const int at : {-line - 1, -line, line - 1, line})
+				{
+					EXPECT_NEAR(Pixel(c_FloorWidth / 2 + at, c_FloorHeight / 2 + beside)[0], grey, 2.0f);
+					if (std::abs(at) < c_FloorHeight / 2)
+					{
+						EXPECT_NEAR(Pixel(c_FloorWidth / 2 + beside, c_FloorHeight / 2 + at)[0], grey, 2.0f);
+					}
+				}
+			}
+		}
+	}
+}
+
 TEST_P(RenderFloor, IsDrawnWithItsOptionForTheEyeAlone)
 {
 	for (const std::uint32_t mode : {CoreGraphics::ERenderPick, CoreGraphics::ERenderId})

@@ -5,6 +5,7 @@
 #include "CoreGraphics/Texture.h"
 #include "OrlexGraphics/SceneOptions.h"
 
+#include <QMatrix4x4>
 #include <QOpenGLFunctions>
 
 #include <algorithm>
@@ -70,6 +71,7 @@ CoreGraphics::VRenderState StateOf(bool i_bTranslucent)
 
 VRenderFloorGrid::VRenderFloorGrid(CoreGraphics::VShaderLibrary& io_rLibrary)
     : m_pLines(io_rLibrary.GetProgram("FloorGrid", "FloorGrid")),
+      m_pComputedLines(io_rLibrary.GetProgram("FloorGrid", "FloorGridComputed")),
       m_pEdges(io_rLibrary.GetProgram("FloorGrid", "UniformColour")),
       m_Square(
           CoreGraphics::VVertexFormat::Format2D(), CoreGraphics::BytesOf(std::vector<float>{0, 0, 1, 0, 1, 1, 0, 1}))
@@ -104,25 +106,54 @@ void VRenderFloorGrid::Render(VRenderContext& io_rContext, const VSceneOptions& 
 	io_rContext.m_pFunctions->glDisable(GL_POLYGON_OFFSET_FILL);
 }
 
-void VRenderFloorGrid::RenderLines(VRenderContext& io_rContext, const VFloor& i_rFloor)
+void VRenderFloorGrid::BindTexture(VRenderContext& io_rContext)
 {
 	if (!m_pTexture || !m_pTexture->IsUsable())
 		m_pTexture = MakeTexture();
-	if (!io_rContext.UseProgram(m_pLines))
-		return;
 	CoreGraphics::VTextureSampling sampling;
-	// On a processor the two lookups are nearly all that the floor costs, and twice as much between two mipmaps. Half a
-	// level less makes it the finer one of the two: the coarser one would blur the lines.
-	const bool bOneMipmap = io_rContext.m_bSoftware;
-	sampling.m_Minification = bOneMipmap ? CoreGraphics::EMinificationLinearMipmapNearest
-	                                     : CoreGraphics::EMinificationLinearMipmapLinear;
+	sampling.m_Minification = CoreGraphics::EMinificationLinearMipmapLinear;
 	sampling.m_bMagnificationLinear = true;
 	sampling.m_Anisotropy = c_Anisotropy;
 	m_pTexture->Bind(io_rContext, 0, sampling);
 	io_rContext.SetUniform(m_Texture, 0);
-	io_rContext.SetUniform(m_LevelBias, bOneMipmap ? -0.5f : 0.0f);
-	io_rContext.SetUniform(m_GridSpacings,
-	    QVector2D(i_rFloor.m_Spacing, i_rFloor.m_Spacing / static_cast<float>(std::max(i_rFloor.m_Divisions, 1u))));
+}
+
+void VRenderFloorGrid::SetPixelSize(VRenderContext& io_rContext, const QVector2D& i_rSpacings)
+{
+	// From a place on the floor to where it is in the frame, without depth.
+	QMatrix4x4 plane = io_rContext.m_Projection * io_rContext.m_View;
+	plane.setColumn(1, plane.column(io_rContext.m_bYUp ? 2 : 1));
+	plane.setColumn(2, QVector4D(0.0f, 0.0f, 1.0f, 0.0f));
+	plane.setRow(2, QVector4D(0.0f, 0.0f, 1.0f, 0.0f));
+	const QMatrix4x4 toPlane = plane.inverted();
+	const QVector4D across = toPlane.column(0) * (2.0f / static_cast<float>(io_rContext.m_Viewport.width()));
+	const QVector4D up = toPlane.column(1) * (2.0f / static_cast<float>(io_rContext.m_Viewport.height()));
+	const auto tiles = [&i_rSpacings](const QVector4D& i_rStep)
+	{
+		return QVector4D(i_rStep.x() / i_rSpacings.x(), i_rStep.y() / i_rSpacings.x(), i_rStep.x() / i_rSpacings.y(),
+		    i_rStep.y() / i_rSpacings.y());
+	};
+	io_rContext.SetUniform(m_TilesAcross, tiles(across));
+	io_rContext.SetUniform(m_TilesUp, tiles(up));
+	io_rContext.SetUniform(m_InverseDepths, QVector2D(across.w(), up.w()));
+}
+
+void VRenderFloorGrid::RenderLines(VRenderContext& io_rContext, const VFloor& i_rFloor)
+{
+	// On a processor the two lookups are most of what the floor costs, and without anisotropy they blur.
+	const bool bComputed = io_rContext.m_bSoftware;
+	if (!io_rContext.UseProgram(bComputed ? m_pComputedLines : m_pLines))
+		return;
+	const QVector2D spacings(
+	    i_rFloor.m_Spacing, i_rFloor.m_Spacing / static_cast<float>(std::max(i_rFloor.m_Divisions, 1u)));
+	if (bComputed)
+	{
+		io_rContext.SetUniform(m_LineWidth, static_cast<float>(c_LineWidth) / c_TextureSide);
+		SetPixelSize(io_rContext, spacings);
+	}
+	else
+		BindTexture(io_rContext);
+	io_rContext.SetUniform(m_GridSpacings, spacings);
 	io_rContext.BindVertices(m_Square);
 	io_rContext.m_pFunctions->glPolygonOffset(2.0f, 4.0f);
 	DrawExtents(io_rContext, GL_TRIANGLE_FAN, ExtentsOf(i_rFloor));

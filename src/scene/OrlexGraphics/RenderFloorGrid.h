@@ -9,6 +9,7 @@
 #include <memory>
 #include <optional>
 
+class QVector2D;
 class QVector4D;
 
 namespace CoreGraphics
@@ -54,16 +55,22 @@ public:
 
 private:
 	void RenderLines(CoreGraphics::VRenderContext& io_rContext, const VFloor& i_rFloor);
+	void BindTexture(CoreGraphics::VRenderContext& io_rContext);
+	void SetPixelSize(CoreGraphics::VRenderContext& io_rContext, const QVector2D& i_rSpacings);
 	void RenderEdges(CoreGraphics::VRenderContext& io_rContext, const VFloor& i_rFloor);
 	void DrawExtents(CoreGraphics::VRenderContext& io_rContext, unsigned int i_Mode, const QVector4D& i_rExtents);
 
 	const std::shared_ptr<CoreGraphics::VShaderProgram> m_pLines;
+	const std::shared_ptr<CoreGraphics::VShaderProgram> m_pComputedLines;
 	const std::shared_ptr<CoreGraphics::VShaderProgram> m_pEdges;
 	CoreGraphics::VVertexBuffer m_Square;
 	CoreGraphics::VUniform m_Extents{"u_Extents"};
 	CoreGraphics::VUniform m_GridSpacings{"u_GridSpacings"};
-	CoreGraphics::VUniform m_LevelBias{"u_LevelBias"};
 	CoreGraphics::VUniform m_Texture{"t_Texture"};
+	CoreGraphics::VUniform m_LineWidth{"u_LineWidth"};
+	CoreGraphics::VUniform m_TilesAcross{"u_TilesAcross"};
+	CoreGraphics::VUniform m_TilesUp{"u_TilesUp"};
+	CoreGraphics::VUniform m_InverseDepths{"u_InverseDepths"};
 	CoreGraphics::VUniform m_Colour{"u_colour"};
 	std::unique_ptr<CoreGraphics::VTexture> m_pTexture;
 	std::optional<VFloor> m_Floor;

@@ -18,3 +18,9 @@ float Light(vec3 i_Normal, vec3 i_ToCamera, vec3 i_Up, vec4 i_Lights)
 	return i_Lights.x + Diffuse(i_Normal, -i_Up) * i_Lights.y + Diffuse(i_Normal, i_Up) * i_Lights.z
 		+ Diffuse(i_Normal, i_ToCamera) * i_Lights.w;
 }
+
+// Between its lines the floor is dark, and seen from below it hides less.
+vec4 Floor(float i_Lines, float i_CameraHeight)
+{
+	return vec4(vec3(0.2 + i_Lines), i_CameraHeight < 0.0 ? 0.25 : 0.75);
+}
