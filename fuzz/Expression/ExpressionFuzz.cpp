@@ -1,3 +1,5 @@
+#include "../Require.h"
+
 #include "CoreOrlexTypesUtils/StaticExpressionParser.h"
 
 #include "math/MathFactorySymbolicLinear.h"
@@ -9,12 +11,6 @@ using namespace CoreOrlexTypesUtils;
 
 namespace
 {
-
-void Require(bool i_bHolds)
-{
-	if (!i_bHolds)
-		std::abort();
-}
 
 class VIgnore final : public Math::IMathResult
 {

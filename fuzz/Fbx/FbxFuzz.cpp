@@ -1,22 +1,11 @@
 #include "../../tests/FBXIO/SoundScene.h"
+#include "../Require.h"
 #include "DebugServices/GlobalLog.h"
 #include "fbxsdk/container/Arrays.h"
 #include "fbxsdk/container/FileKind.h"
 
 #include <cstdint>
-#include <cstdlib>
 #include <string>
-
-namespace
-{
-
-void Require(bool i_bHolds)
-{
-	if (!i_bHolds)
-		std::abort();
-}
-
-} // namespace
 
 /// The whole road from a file to its bones, meshes and skin, and every array in it.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i_Size)

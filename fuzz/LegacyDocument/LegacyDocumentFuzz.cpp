@@ -1,21 +1,15 @@
 // A legacy text file is the one entrance that checks nothing of a subject but its form: whatever it holds goes through
 // the document's commands and must leave lists that run parallel.
+#include "../Require.h"
+
 #include "DebugServices/GlobalLog.h"
 #include "InMemoryHost/PluginContext.h"
 #include "RetargetSetupDocument/LegacyText.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
 
-#include <cstdlib>
-
 namespace
 {
-
-void Require(bool i_bHolds)
-{
-	if (!i_bHolds)
-		std::abort();
-}
 
 void CheckParallel(const VRetargetSetup& i_rDocument)
 {

@@ -1,8 +1,7 @@
+#include "../Require.h"
+
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexQRTIO/Writer.h"
-
-#include <cstdio>
-#include <cstdlib>
 
 using namespace CoreOrlexQRTIO;
 
@@ -17,14 +16,6 @@ struct VContent
 	std::vector<std::string> m_Errors;
 	std::vector<std::string> m_Warnings;
 };
-
-void Require(bool i_bHolds, const char* i_pWhat)
-{
-	if (i_bHolds)
-		return;
-	std::fprintf(stderr, "Broken: %s\n", i_pWhat);
-	std::abort();
-}
 
 bool Read(const std::string& i_rText, VContent& o_rContent)
 {

@@ -1,21 +1,15 @@
+#include "../Require.h"
+
 #include "CoreOrlexTypes/Subject.h"
 #include "CoreOrlexTypes/SubjectRecord.h"
 #include "TesselDataStore/SkipReaders.h"
 #include "TesselDataStore/StoredValue.h"
 #include "TesselDataStore/ValueText.h"
 
-#include <cstdlib>
-
 namespace
 {
 
 using namespace NVX::IO;
-
-void Require(bool i_bHolds)
-{
-	if (!i_bHolds)
-		std::abort();
-}
 
 /// Takes a byte from the front of the input; 0 at its end.
 std::uint8_t Take(std::string_view& io_rInput)

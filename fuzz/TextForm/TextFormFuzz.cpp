@@ -1,17 +1,11 @@
-#include "CoreOrlexTypes/TextForm.h"
+#include "../Require.h"
 
-#include <cstdlib>
+#include "CoreOrlexTypes/TextForm.h"
 
 namespace
 {
 
 using namespace CoreOrlexTypes;
-
-void Require(bool i_bHolds)
-{
-	if (!i_bHolds)
-		std::abort();
-}
 
 /// Whatever is read can be written, in both spellings, and reads back equal.
 template <typename T>

@@ -1,8 +1,9 @@
+#include "../Require.h"
+
 #include "UtilsRapidXml/Attributes.h"
 #include "UtilsRapidXml/ReaderNode.h"
 
 #include <cstdint>
-#include <cstdlib>
 #include <string>
 
 namespace
@@ -33,12 +34,6 @@ void Node(INode& io_rNode)
 	io_rNode.DeclareElement("Node", "", 0, 2);
 	io_rNode.DeclareElement("Many", "", 1, c_Unbounded, {}, {3, 0});
 	io_rNode.ProcessElements(Node);
-}
-
-void Require(bool i_bHolds)
-{
-	if (!i_bHolds)
-		std::abort();
 }
 
 } // namespace
