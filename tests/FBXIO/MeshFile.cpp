@@ -9,11 +9,6 @@ using namespace FbxTest;
 namespace
 {
 
-VTestRecord Record(const char* i_pName, std::vector<VTestValue> i_Values)
-{
-	return {i_pName, std::move(i_Values), {}};
-}
-
 VTestValue Integers(const VNumbers& i_rNumbers)
 {
 	return VIntegers(i_rNumbers.begin(), i_rNumbers.end());
@@ -24,27 +19,19 @@ class VObjects
 {
 public:
 	VObjects(const VTestForm& i_rForm, const VTestScene& i_rScene)
-	    : m_rScene(i_rScene), m_bNew(i_rForm.m_Version >= 7000), m_Records(Records(i_rForm, i_rScene))
+	    : m_bNew(i_rForm.m_Version >= 7000), m_Records(Records(i_rForm, i_rScene))
 	{
 	}
 
-	bool IsNew() const { return m_bNew; }
 	std::vector<VTestRecord>& All() { return m_Records; }
 
-	VTestValue NodeKey(int i_Node) const
-	{
-		return m_bNew ? VTestValue(std::int64_t(i_Node + 1)) : VTestValue("Model::" + m_rScene.m_Nodes[i_Node].m_Name);
-	}
-
 	/// The record of a node.
-	VTestRecord& Node(int i_Node)
+	VTestRecord& Node(const VTestValue& i_rKey)
 	{
-		const std::string name = "Model::" + m_rScene.m_Nodes[i_Node].m_Name;
 		auto& rObjects = Top("Objects").m_Children;
 		return *std::find_if(rObjects.begin(), rObjects.end(),
-		    [&](const VTestRecord& i_rRecord) {
-			    return i_rRecord.m_Name == "Model" && std::get<std::string>(i_rRecord.m_Values[m_bNew ? 1 : 0]) == name;
-		    });
+		    [&](const VTestRecord& i_rRecord)
+		    { return i_rRecord.m_Name == "Model" && i_rRecord.m_Values[0] == i_rKey; });
 	}
 
 	/// @return what connections name the object by.
@@ -52,11 +39,10 @@ public:
 	    const char* i_pClass, const std::string& i_rName, const char* i_pKind, std::vector<VTestRecord> i_Children)
 	{
 		const std::string name = std::string(i_pClass) + "::" + i_rName;
-		VTestRecord object = Record(i_pClass, {name, std::string(i_pKind)});
+		VTestRecord object = Record(i_pClass, {name, std::string(i_pKind)}, std::move(i_Children));
 		const std::int64_t id = 2'000'000 + m_Count++;
 		if (m_bNew)
 			object.m_Values.insert(object.m_Values.begin(), id);
-		object.m_Children = std::move(i_Children);
 		Top("Objects").m_Children.push_back(std::move(object));
 		return m_bNew ? VTestValue(id) : VTestValue(name);
 	}
@@ -77,7 +63,6 @@ private:
 		    [&](const VTestRecord& i_rRecord) { return i_rRecord.m_Name == i_pName; });
 	}
 
-	const VTestScene& m_rScene;
 	bool m_bNew;
 	std::vector<VTestRecord> m_Records;
 	std::int64_t m_Count = 0;
@@ -88,9 +73,9 @@ void AddLayer(std::vector<VTestRecord>& io_rGeometry, const char* i_pName, const
 {
 	if (i_rLayer.m_Mapping.empty())
 		return;
-	VTestRecord layer = Record(i_pName, {std::int32_t(0)});
-	layer.m_Children = {Record("MappingInformationType", {i_rLayer.m_Mapping}),
-	    Record("ReferenceInformationType", {i_rLayer.m_Reference})};
+	VTestRecord layer = Record(i_pName, {std::int32_t(0)},
+	    {Record("MappingInformationType", {i_rLayer.m_Mapping}),
+	        Record("ReferenceInformationType", {i_rLayer.m_Reference})});
 	if (*i_pDirect)
 		layer.m_Children.push_back(Record(i_pDirect, {i_rLayer.m_Direct}));
 	if (!i_rLayer.m_Index.empty())
@@ -98,21 +83,7 @@ void AddLayer(std::vector<VTestRecord>& io_rGeometry, const char* i_pName, const
 	io_rGeometry.push_back(std::move(layer));
 }
 
-VTestRecord Properties(bool i_bNew, const std::vector<std::pair<std::string, VNumbers>>& i_rProperties)
-{
-	VTestRecord list = Record(i_bNew ? "Properties70" : "Properties60", {});
-	for (const auto& [name, numbers] : i_rProperties)
-	{
-		std::vector<VTestValue> values{name, std::string(numbers.size() == 1 ? "Number" : "Color"), std::string()};
-		if (i_bNew)
-			values.push_back(std::string("A"));
-		values.insert(values.end(), numbers.begin(), numbers.end());
-		list.m_Children.push_back(Record(i_bNew ? "P" : "Property", std::move(values)));
-	}
-	return list;
-}
-
-void AddMaterials(const VTestForm& i_rForm, VObjects& io_rObjects, const VTestMesh& i_rMesh)
+void AddMaterials(const VTestForm& i_rForm, const VTestValue& i_rNode, VObjects& io_rObjects, const VTestMesh& i_rMesh)
 {
 	for (std::size_t i = 0; i < i_rMesh.m_Materials.size(); ++i)
 	{
@@ -120,8 +91,8 @@ void AddMaterials(const VTestForm& i_rForm, VObjects& io_rObjects, const VTestMe
 		const std::string name = std::to_string(i_rMesh.m_Node) + '-' + std::to_string(i);
 		const VTestValue key = io_rObjects.Add("Material", "material" + name, "",
 		    {Record("ShadingModel", {rMaterial.m_ShadingModel}),
-		        Properties(io_rObjects.IsNew(), rMaterial.m_Properties)});
-		io_rObjects.Connect(key, io_rObjects.NodeKey(i_rMesh.m_Node));
+		        PropertyList(i_rForm.m_Version, rMaterial.m_Properties)});
+		io_rObjects.Connect(key, i_rNode);
 		if (rMaterial.m_FileName.empty() && rMaterial.m_RelativeName.empty())
 			continue;
 		const VTestValue texture = io_rObjects.Add("Texture", "texture" + name, "TextureVideoClip",
@@ -136,10 +107,10 @@ void AddMaterials(const VTestForm& i_rForm, VObjects& io_rObjects, const VTestMe
 			            : '"' + text.left(8).toStdString() + "\",\n\"" + text.mid(8).toStdString() + '"'}});
 			io_rObjects.Connect(io_rObjects.Add("Video", "video" + name, "Clip", {std::move(content)}), texture);
 		}
-		if (io_rObjects.IsNew())
+		if (i_rForm.m_Version >= 7000)
 			io_rObjects.Connect(texture, key, "DiffuseColor");
 		else
-			io_rObjects.Connect(texture, io_rObjects.NodeKey(i_rMesh.m_Node));
+			io_rObjects.Connect(texture, i_rNode);
 	}
 }
 
@@ -151,7 +122,7 @@ std::vector<VTestRecord> FbxTest::Records(
 	VObjects objects(i_rForm, i_rScene);
 	for (const VTestMesh& rMesh : i_rMeshes)
 	{
-		const VTestValue node = objects.NodeKey(rMesh.m_Node);
+		const VTestValue node = NodeKey(i_rForm, i_rScene, rMesh.m_Node);
 		const std::string& rName = i_rScene.m_Nodes[rMesh.m_Node].m_Name;
 		std::vector<VTestRecord> geometry{
 		    Record("Vertices", {rMesh.m_Points}), Record("PolygonVertexIndex", {Integers(rMesh.m_Polygons)})};
@@ -161,24 +132,22 @@ std::vector<VTestRecord> FbxTest::Records(
 		AddLayer(geometry, "LayerElementTexture", "", "TextureId", rMesh.m_TextureLayer);
 		VTestRecord layer = Record("Layer", {std::int32_t(0)});
 		for (std::size_t i = 2; i < geometry.size(); ++i)
-		{
-			VTestRecord& rElement = layer.m_Children.emplace_back(Record("LayerElement", {}));
-			rElement.m_Children = {Record("Type", {geometry[i].m_Name}), Record("TypedIndex", {std::int32_t(0)})};
-		}
+			layer.m_Children.push_back(Record(
+			    "LayerElement", {}, {Record("Type", {geometry[i].m_Name}), Record("TypedIndex", {std::int32_t(0)})}));
 		if (!layer.m_Children.empty())
 			geometry.push_back(std::move(layer));
 		VTestValue owner = node;
-		if (objects.IsNew())
+		if (i_rForm.m_Version >= 7000)
 		{
 			owner = objects.Add("Geometry", rName + "Shape", "Mesh", std::move(geometry));
 			objects.Connect(owner, node);
 		}
 		else
 		{
-			auto& rChildren = objects.Node(rMesh.m_Node).m_Children;
+			auto& rChildren = objects.Node(node).m_Children;
 			rChildren.insert(rChildren.end(), geometry.begin(), geometry.end());
 		}
-		AddMaterials(i_rForm, objects, rMesh);
+		AddMaterials(i_rForm, node, objects, rMesh);
 		if (rMesh.m_Clusters.empty())
 			continue;
 		const VTestValue skin =
@@ -199,7 +168,7 @@ std::vector<VTestRecord> FbxTest::Records(
 			    objects.Add("Deformer", rName + " cluster" + std::to_string(i), "Cluster", std::move(children));
 			objects.Connect(cluster, skin);
 			if (rCluster.m_Node >= 0)
-				objects.Connect(objects.NodeKey(rCluster.m_Node), cluster);
+				objects.Connect(NodeKey(i_rForm, i_rScene, rCluster.m_Node), cluster);
 		}
 	}
 	return std::move(objects.All());

@@ -1,7 +1,6 @@
 #include "FBXIO/FBXReader.h"
 
 #include "MeshFile.h"
-#include "TestFile.h"
 #include "TestLog.h"
 
 #include <gtest/gtest.h>
@@ -34,9 +33,9 @@ class Skin : public testing::TestWithParam<VTestForm>
 protected:
 	VSkin Read(const VTestScene& i_rScene, const std::vector<VTestMesh>& i_rMeshes)
 	{
-		const VTestFile file(Write(GetParam(), i_rScene, i_rMeshes));
+		const std::string file = Write(GetParam(), i_rScene, i_rMeshes);
 		FBXReader reader;
-		EXPECT_TRUE(reader.LoadFile(file.Path()));
+		EXPECT_TRUE(reader.LoadMemory(file, "PATH"));
 		VSkin skin;
 		reader.ReadSkin(skin);
 		m_pFull = reader.GetSkeleton();
@@ -195,9 +194,9 @@ TEST_P(Skin, WhatIsFoundOfAMeshIsToldOnce)
 	mesh.m_MaterialLayer = {};
 	mesh.m_Points[4] = std::nan("");
 	mesh.m_UV = {"ByPolygonVertex", "IndexToDirect", {0, 0, 1, 0}, {0, 0, 7}};
-	const VTestFile file(Write(GetParam(), scene, {mesh}));
+	const std::string file = Write(GetParam(), scene, {mesh});
 	FBXReader reader;
-	ASSERT_TRUE(reader.LoadFile(file.Path()));
+	ASSERT_TRUE(reader.LoadMemory(file, "PATH"));
 	std::vector<VPlacedMesh> placed;
 	reader.ReadPlacedMeshes(placed);
 	EXPECT_EQ(m_Log.m_Messages.size(), 5u) << "the load, a number, a moved and an unmapped vertex, no material";

@@ -1,13 +1,8 @@
-
 #include "fbxsdk/Limits.h"
 
 #include "FbxFileBuilder.h"
-#include "TestFile.h"
+#include "Imported.h"
 #include "TestLog.h"
-
-#include <fbxsdk.h>
-
-#include <gtest/gtest.h>
 
 using namespace FbxTest;
 using namespace std::string_literals;
@@ -26,20 +21,9 @@ struct VResult
 VResult Load(const std::string& i_rBytes)
 {
 	const VTestLog quiet;
-	const VTestFile file(i_rBytes);
-	FbxManager* const pManager = FbxManager::Create();
-	FbxScene* const pScene = FbxScene::Create(pManager, "");
-	FbxImporter* const pImporter = FbxImporter::Create(pManager, "");
-	VResult result{};
-	result.m_bInitialized = pImporter->Initialize(file.Path().c_str());
-	if (result.m_bInitialized)
-	{
-		result.m_bComplete = pImporter->Import(pScene);
-		EXPECT_EQ(result.m_bComplete, pImporter->GetStatus().GetCode() == FbxStatus::eSuccess);
-	}
-	else
-		EXPECT_STRNE(pImporter->GetStatus().GetErrorString(), "");
-	std::vector<FbxNode*> open{pScene->GetRootNode()};
+	VImported file(i_rBytes);
+	VResult result{file.m_bInitialized, file.m_bImported, 0};
+	std::vector<FbxNode*> open{file.Root()};
 	while (!open.empty())
 	{
 		FbxNode* const pNode = open.back();
@@ -49,7 +33,6 @@ VResult Load(const std::string& i_rBytes)
 		for (int i = 0; i < pNode->GetChildCount(); ++i)
 			open.push_back(pNode->GetChild(i));
 	}
-	pManager->Destroy();
 	return result;
 }
 

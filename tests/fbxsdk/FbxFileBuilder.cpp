@@ -163,21 +163,6 @@ void WriteText(
 	io_rText += '\n';
 }
 
-VTestRecord PropertyList(std::uint32_t i_Version, const std::vector<std::pair<std::string, VNumbers>>& i_rProperties)
-{
-	const bool bNew = i_Version >= 7000;
-	VTestRecord list{bNew ? "Properties70" : "Properties60", {}, {}};
-	for (const auto& [name, numbers] : i_rProperties)
-	{
-		VTestRecord& rProperty = list.m_Children.emplace_back(
-		    VTestRecord{bNew ? "P" : "Property", {name, std::string("Type"), std::string()}, {}});
-		if (bNew)
-			rProperty.m_Values.push_back(std::string("A+"));
-		rProperty.m_Values.insert(rProperty.m_Values.end(), numbers.begin(), numbers.end());
-	}
-	return list;
-}
-
 } // namespace
 
 std::string FbxTest::Write(const VTestForm& i_rForm, const std::vector<VTestRecord>& i_rRecords)
@@ -196,56 +181,68 @@ std::string FbxTest::Write(const VTestForm& i_rForm, const std::vector<VTestReco
 	return text;
 }
 
+VTestRecord FbxTest::PropertyList(
+    std::uint32_t i_Version, const std::vector<std::pair<std::string, VNumbers>>& i_rProperties)
+{
+	const bool bNew = i_Version >= 7000;
+	VTestRecord list = Record(bNew ? "Properties70" : "Properties60", {});
+	for (const auto& [name, numbers] : i_rProperties)
+	{
+		std::vector<VTestValue> values{name, std::string("Type"), std::string()};
+		if (bNew)
+			values.push_back(std::string("A+"));
+		values.insert(values.end(), numbers.begin(), numbers.end());
+		list.m_Children.push_back(Record(bNew ? "P" : "Property", std::move(values)));
+	}
+	return list;
+}
+
+VTestValue FbxTest::NodeKey(const VTestForm& i_rForm, const VTestScene& i_rScene, int i_Node)
+{
+	if (i_rForm.m_Version >= 7000)
+		return std::int64_t(i_Node + 1);
+	return "Model::" + (i_Node < 0 ? "Scene" : i_rScene.m_Nodes[i_Node].m_Name);
+}
+
 std::vector<VTestRecord> FbxTest::Records(const VTestForm& i_rForm, const VTestScene& i_rScene)
 {
 	const bool bNew = i_rForm.m_Version >= 7000;
-	const auto record = [](const char* i_pName, std::vector<VTestValue> i_Values) -> VTestRecord {
-		return {i_pName, std::move(i_Values), {}};
-	};
-	const auto nodeKey = [&](int i_Node) -> VTestValue
-	{
-		if (bNew)
-			return std::int64_t(i_Node + 1);
-		return i_Node < 0 ? "Model::Scene" : "Model::" + i_rScene.m_Nodes[i_Node].m_Name;
-	};
-
-	VTestRecord objects{"Objects", {}, {}};
-	VTestRecord connections{"Connections", {}, {}};
+	VTestRecord objects = Record("Objects", {});
+	VTestRecord connections = Record("Connections", {});
 	const auto connect = [&](VTestValue i_Child, VTestValue i_Parent)
 	{
 		connections.m_Children.push_back(
-		    record(bNew ? "C" : "Connect", {std::string("OO"), std::move(i_Child), std::move(i_Parent)}));
+		    Record(bNew ? "C" : "Connect", {std::string("OO"), std::move(i_Child), std::move(i_Parent)}));
 	};
+	const auto key = [&](int i_Node) { return NodeKey(i_rForm, i_rScene, i_Node); };
 	for (int i = 0; i < int(i_rScene.m_Nodes.size()); ++i)
 	{
 		const VTestNode& rNode = i_rScene.m_Nodes[i];
-		VTestRecord node = record("Model", {"Model::" + rNode.m_Name, rNode.m_Kind});
-		node.m_Children.push_back(PropertyList(i_rForm.m_Version, rNode.m_Properties));
+		VTestRecord node = Record(
+		    "Model", {"Model::" + rNode.m_Name, rNode.m_Kind}, {PropertyList(i_rForm.m_Version, rNode.m_Properties)});
 		if (bNew)
 		{
 			const std::int64_t attribute = 1'000'000 + i;
-			node.m_Values.insert(node.m_Values.begin(), std::int64_t(i + 1));
+			node.m_Values.insert(node.m_Values.begin(), key(i));
 			objects.m_Children.push_back(
-			    record("NodeAttribute", {attribute, std::string("NodeAttribute::"), rNode.m_Kind}));
-			connect(attribute, nodeKey(i));
+			    Record("NodeAttribute", {attribute, std::string("NodeAttribute::"), rNode.m_Kind}));
+			connect(attribute, key(i));
 		}
 		objects.m_Children.push_back(node);
-		connect(nodeKey(i), nodeKey(rNode.m_Parent));
+		connect(key(i), key(rNode.m_Parent));
 	}
 	for (const auto& [child, parent] : i_rScene.m_Connections)
-		connect(nodeKey(child), nodeKey(parent));
+		connect(key(child), key(parent));
 
-	VTestRecord header{"FBXHeaderExtension", {}, {}};
-	header.m_Children.push_back(record("FBXVersion", {std::int32_t(i_rForm.m_Version)}));
-	header.m_Children.push_back(record("EncryptionType", {std::int32_t(i_rScene.m_EncryptionType)}));
-	VTestRecord settings{"GlobalSettings", {}, {PropertyList(i_rForm.m_Version, i_rScene.m_Settings)}};
-	std::vector<VTestRecord> records{header};
+	const VTestRecord settings = Record("GlobalSettings", {}, {PropertyList(i_rForm.m_Version, i_rScene.m_Settings)});
+	std::vector<VTestRecord> records{Record("FBXHeaderExtension", {},
+	    {Record("FBXVersion", {std::int32_t(i_rForm.m_Version)}),
+	        Record("EncryptionType", {std::int32_t(i_rScene.m_EncryptionType)})})};
 	if (bNew)
 	{
-		VTestRecord type = record("ObjectType", {std::string("Model")});
-		type.m_Children.push_back(
-		    {"PropertyTemplate", {std::string("FbxNode")}, {PropertyList(i_rForm.m_Version, i_rScene.m_Template)}});
-		records.push_back({"Definitions", {}, {type}});
+		const VTestRecord defaults = Record(
+		    "PropertyTemplate", {std::string("FbxNode")}, {PropertyList(i_rForm.m_Version, i_rScene.m_Template)});
+		records.push_back(Record("Definitions", {}, {Record("ObjectType", {std::string("Model")}, {defaults})}));
 		records.push_back(settings);
 	}
 	else

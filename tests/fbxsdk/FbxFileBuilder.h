@@ -19,6 +19,7 @@ using VIntegers = std::vector<std::int32_t>;
 struct VRaw
 {
 	std::string m_Bytes;
+	bool operator==(const VRaw&) const = default;
 };
 using VTestValue = std::variant<std::int64_t, std::int32_t, double, std::string, VNumbers, VIntegers, VRaw>;
 
@@ -70,6 +71,17 @@ struct VTestScene
 	std::vector<std::pair<int, int>> m_Connections;
 	std::int64_t m_EncryptionType = 0;
 };
+
+inline VTestRecord Record(
+    const char* i_pName, std::vector<VTestValue> i_Values, std::vector<VTestRecord> i_Children = {})
+{
+	return {i_pName, std::move(i_Values), std::move(i_Children)};
+}
+
+VTestRecord PropertyList(std::uint32_t i_Version, const std::vector<std::pair<std::string, VNumbers>>& i_rProperties);
+
+/// What connections name a node by: its number, or before version 7 its name. -1 is the scene.
+VTestValue NodeKey(const VTestForm& i_rForm, const VTestScene& i_rScene, int i_Node);
 
 /// The records of the scene as that version has them.
 std::vector<VTestRecord> Records(const VTestForm& i_rForm, const VTestScene& i_rScene);
