@@ -6,56 +6,20 @@ the parent; rotation and scale follow the inherit type, with capitals for the pa
 1 R S r s, 2 R r (S without the parent's own scale) s.
 """
 
-import math
+import pathlib
+import sys
 
-ORDERS = ("xyz", "xzy", "yzx", "yxz", "zxy", "zyx")
+sys.path.insert(0, str(pathlib.Path(__file__).resolve().parents[3] / "demo"))
 
-
-def identity():
-    return [[1.0 if row == column else 0.0 for column in range(4)] for row in range(4)]
-
-
-def product(*factors):
-    result = identity()
-    for factor in factors:
-        result = [[sum(result[i][k] * factor[k][j] for k in range(4)) for j in range(4)] for i in range(4)]
-    return result
-
-
-def shift(v, sign=1.0):
-    result = identity()
-    for i in range(3):
-        result[i][3] = sign * v[i]
-    return result
-
-
-def stretch(v):
-    result = identity()
-    for i in range(3):
-        result[i][i] = float(v[i])
-    return result
+from matrix import ROTATION_ORDERS, axis_rotation, identity, multiply, rigid_inverse, scaling, translation
 
 
 def turn(degrees, order="xyz"):
-    x, y, z = (math.radians(angle) for angle in degrees)
-    about = {
-        "x": [[1, 0, 0, 0], [0, math.cos(x), -math.sin(x), 0], [0, math.sin(x), math.cos(x), 0], [0, 0, 0, 1]],
-        "y": [[math.cos(y), 0, math.sin(y), 0], [0, 1, 0, 0], [-math.sin(y), 0, math.cos(y), 0], [0, 0, 0, 1]],
-        "z": [[math.cos(z), -math.sin(z), 0, 0], [math.sin(z), math.cos(z), 0, 0], [0, 0, 1, 0], [0, 0, 0, 1]],
-    }
-    return product(*(about[axis] for axis in reversed(order)))
-
-
-def turned_back(rotation):
-    """The inverse of a rotation."""
-    return [[rotation[j][i] for j in range(4)] for i in range(4)]
+    return multiply(*(axis_rotation(axis, degrees["xyz".index(axis)]) for axis in reversed(order)))
 
 
 def linear_part(matrix):
-    result = identity()
-    for i in range(3):
-        result[i][:3] = matrix[i][:3]
-    return result
+    return [row[:3] + [0.0] for row in matrix[:3]] + identity()[3:]
 
 
 class Node:
@@ -84,11 +48,12 @@ class Node:
     def _evaluate(self):
         pre = self.pre_rotation = turn(self.pre) if self.active else identity()
         post = turn(self.post) if self.active else identity()
-        rotation = product(pre, turn(self.rotation, ORDERS[self.order if self.active else 0]), turned_back(post))
-        own = product(
-            shift(self.translation), shift(self.rotation_offset), shift(self.rotation_pivot), rotation,
-            shift(self.rotation_pivot, -1.0), shift(self.scaling_offset), shift(self.scaling_pivot),
-            stretch(self.scale), shift(self.scaling_pivot, -1.0))
+        rotation = multiply(pre, turn(self.rotation, ROTATION_ORDERS[self.order if self.active else 0]), rigid_inverse(post))
+        rotation_pivot, scaling_pivot = translation(self.rotation_pivot), translation(self.scaling_pivot)
+        own = multiply(
+            translation(self.translation), translation(self.rotation_offset), rotation_pivot, rotation,
+            rigid_inverse(rotation_pivot), translation(self.scaling_offset), scaling_pivot,
+            scaling(self.scale), rigid_inverse(scaling_pivot))
         self.local = own
         parent = self.parent
         if parent is None:
@@ -98,17 +63,17 @@ class Node:
         if self.inherit == 2:
             above = [total / last for total, last in zip(above, parent.scale)]
         # Only types 0 and 2 need rotation and scale apart; they are not asked for below a sheared node.
-        self.world_rotation = product(parent.world_rotation, rotation)
+        self.world_rotation = multiply(parent.world_rotation, rotation)
         self.world_scale = [a * b for a, b in zip(above, self.scale)]
         if self.inherit == 1:
-            linear = product(linear_part(parent.world), rotation, stretch(self.scale))
+            linear = multiply(linear_part(parent.world), rotation, scaling(self.scale))
         else:
-            linear = product(self.world_rotation, stretch(self.world_scale))
+            linear = multiply(self.world_rotation, scaling(self.world_scale))
         place = [sum(parent.world[i][k] * own[k][3] for k in range(3)) + parent.world[i][3] for i in range(3)]
-        self.world = product(shift(place), linear)
+        self.world = multiply(translation(place), linear)
 
     def local_without_pre_rotation(self):
-        return product(self.local, turned_back(self.pre_rotation))
+        return multiply(self.local, rigid_inverse(self.pre_rotation))
 
     def accumulated_scale(self):
         return self.scale[0] * (self.parent.accumulated_scale() if self.parent else 1.0)
