@@ -1,21 +1,10 @@
 #include "Rows.h"
 
-#include <nlohmann/json.hpp>
-
 #include <cmath>
 #include <fstream>
 
 namespace
 {
-
-using VJson = nlohmann::json;
-
-VJson RunJson(const std::vector<std::string>& i_rArguments, const VScratchFolder& i_rFolder)
-{
-	const VRun run = RunRetarget(i_rArguments, i_rFolder.Path());
-	EXPECT_EQ(run.m_Status, 0) << run.m_Err;
-	return VJson::parse(run.m_Out, nullptr, false);
-}
 
 /// Creates x.qrr with these edits.
 class Edit : public testing::Test
@@ -25,7 +14,7 @@ protected:
 	{
 		std::vector<std::string> arguments{"create", "--fbx", i_rFbx, "--source", c_Performer, "-o", "x.qrr"};
 		arguments.insert(arguments.end(), i_Edits.begin(), i_Edits.end());
-		VRun run = RunRetarget(arguments, m_Folder.Path());
+		VRun run = m_Folder.Run(arguments);
 		EXPECT_EQ(run.m_Status, 0) << run.m_Err;
 		return run;
 	}
@@ -87,16 +76,13 @@ TEST_F(Edit, ResidualsFollowThePoseUntilTheTargetsAreUpdated)
 	ASSERT_EQ(pose, VJson({0.0, 0.0, 0.0})) << "a bone at rest";
 	const std::vector<std::string> edit{
 	    "edit", "x.qrr", "--source", c_Performer, "--pose", "Spine=0.5,0,0", "-o", "x.qrr"};
-	EXPECT_EQ(RunRetarget(edit, m_Folder.Path()).m_Status, 0);
+	EXPECT_EQ(m_Folder.Run(edit).m_Status, 0);
 	EXPECT_NEAR(Targets()[0].at("angle"), 0.5 * 180.0 / M_PI, 1e-9);
 	EXPECT_GT(Targets()[1].at("distance"), 50.0);
 	const VJson joint = Subject().at("Segments")[1].at("Joint");
 	EXPECT_EQ(joint.at("BindPose"), VJson({0.5, 0.0, 0.0}));
 	EXPECT_EQ(joint.at("Mean"), joint.at("BindPose"));
-	EXPECT_EQ(
-	    RunRetarget({"edit", "x.qrr", "--source", c_Performer, "--update-targets", "-o", "x.qrr"}, m_Folder.Path())
-	        .m_Status,
-	    0);
+	EXPECT_EQ(m_Folder.Run({"edit", "x.qrr", "--source", c_Performer, "--update-targets", "-o", "x.qrr"}).m_Status, 0);
 	EXPECT_NEAR(Targets()[0].at("angle"), 0.0, 1e-9);
 	EXPECT_NEAR(Targets()[1].at("distance"), 0.0, 1e-5);
 }
@@ -142,11 +128,10 @@ TEST_F(Edit, WhatSurprisesIsTold)
 	    << built.m_Err;
 	EXPECT_EQ(Create({"--match-file-pose"}, arnaud).m_Err.find("as built"), std::string::npos);
 
-	const VRun other =
-	    RunRetarget({"edit", "x.qrr", "--source", Data("../../demo/performer.qrs"), "-o", "y.qrr"}, m_Folder.Path());
+	const VRun other = m_Folder.Run({"edit", "x.qrr", "--source", Data("../../demo/performer.qrs"), "-o", "y.qrr"});
 	EXPECT_EQ(other.m_Err.find("made for the source"), std::string::npos) << "of the same name";
-	std::filesystem::copy(c_Performer, m_Folder / "other.qrs");
-	EXPECT_NE(RunRetarget({"targets", "x.qrr", "--source", "other.qrs"}, m_Folder.Path())
+	m_Folder.Write("other.qrs", Get(c_Performer));
+	EXPECT_NE(m_Folder.Run({"targets", "x.qrr", "--source", "other.qrs"})
 	              .m_Err.find("The retarget subject was made for the source \"performer\", not for \"other\""),
 	    std::string::npos);
 }
@@ -154,10 +139,10 @@ TEST_F(Edit, WhatSurprisesIsTold)
 TEST_F(Edit, ToStandardOutput)
 {
 	Create({"--rotation", "Head:Head"});
-	const VRun run = RunRetarget({"edit", "x.qrr", "-o", "-"}, m_Folder.Path());
+	const VRun run = m_Folder.Run({"edit", "x.qrr", "-o", "-"});
 	EXPECT_EQ(run.m_Status, 0);
 	EXPECT_EQ(run.m_Out, m_Folder.Read("x.qrr"));
-	const VRun table = RunRetarget({"-q", "targets", "x.qrr"}, m_Folder.Path());
+	const VRun table = m_Folder.Run({"-q", "targets", "x.qrr"});
 	EXPECT_EQ(table.m_Out.substr(0, table.m_Out.find('\n')),
 	    "INDEX  NAME       TYPE                          SOURCE  TARGET  WEIGHT  STATE");
 	EXPECT_NE(table.m_Out.find("\n    0  Head}Head  LocalRotationToWorldRotation  Head    Head         1  "),

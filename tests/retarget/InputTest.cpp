@@ -3,31 +3,19 @@
 namespace
 {
 
-std::string Replaced(std::string i_Text, const std::string& i_rFrom, const std::string& i_rTo)
-{
-	return i_Text.replace(i_Text.find(i_rFrom), i_rFrom.size(), i_rTo);
-}
-
-std::string FileText(const std::string& i_rPath)
-{
-	const VScratchFolder folder;
-	std::filesystem::copy(i_rPath, folder / "copy");
-	return folder.Read("copy");
-}
-
 /// What a reader can meet at each entrance: the same files for every command that reads.
 class Input : public testing::Test
 {
 protected:
 	Input()
 	{
-		const std::string performer = FileText(c_Performer);
+		const std::string performer = Get(c_Performer);
 		m_Folder.Write("empty", "");
 		m_Folder.Write("wrong.qrs", "<Skeleton/>");
-		m_Folder.Write("new.qrs", Replaced(performer, "VERSION=\"3.5\"", "VERSION=\"3.6\""));
+		m_Folder.Write("new.qrs", Replaced(c_Performer, "VERSION=\"3.5\"", "VERSION=\"3.6\""));
 		m_Folder.Write("cut.qrs", performer.substr(0, performer.size() / 2));
 		m_Folder.Write("text.qrs", "Once upon a time");
-		m_Folder.Write("cut.fbx", FileText(c_Fbx).substr(0, 70000));
+		m_Folder.Write("cut.fbx", Get(c_Fbx).substr(0, 70000));
 		m_Folder.Write("new.qrx", "[[1,0,2],\"QRX\"]{}");
 		m_Folder.Write("text.qrx", "Once upon a time");
 	}
@@ -104,21 +92,19 @@ TEST_F(Input, OutputThatCannotBeWritten)
 /// The file that is replaced is the one that was read, and a failure half-way leaves it.
 TEST_F(Input, AFailedEditLeavesTheFileAlone)
 {
-	ASSERT_EQ(RunRetarget({"create", "--fbx", c_Fbx, "-o", "x.qrr"}, m_Folder.Path()).m_Status, 0);
+	ASSERT_EQ(m_Folder.Run({"create", "--fbx", c_Fbx, "-o", "x.qrr"}).m_Status, 0);
 	const std::string before = m_Folder.Read("x.qrr");
-	EXPECT_EQ(
-	    RunRetarget({"edit", "x.qrr", "--scale", "2", "--pose", "No=1,2,3", "-o", "x.qrr"}, m_Folder.Path()).m_Status,
-	    2);
+	EXPECT_EQ(m_Folder.Run({"edit", "x.qrr", "--scale", "2", "--pose", "No=1,2,3", "-o", "x.qrr"}).m_Status, 2);
 	EXPECT_EQ(m_Folder.Read("x.qrr"), before);
-	EXPECT_EQ(RunRetarget({"edit", "x.qrr", "--scale", "2", "-o", "x.qrr"}, m_Folder.Path()).m_Status, 0);
+	EXPECT_EQ(m_Folder.Run({"edit", "x.qrr", "--scale", "2", "-o", "x.qrr"}).m_Status, 0);
 	EXPECT_NE(m_Folder.Read("x.qrr"), before);
-	EXPECT_EQ(RunRetarget({"edit", "x.qrr", "--scale", "1", "-o", "x.qrr"}, m_Folder.Path()).m_Status, 0);
+	EXPECT_EQ(m_Folder.Run({"edit", "x.qrr", "--scale", "1", "-o", "x.qrr"}).m_Status, 0);
 	EXPECT_EQ(m_Folder.Read("x.qrr"), before);
 }
 
 TEST(Output, StandardOutputThatIsFull)
 {
-	if (!std::filesystem::exists("/dev/full"))
+	if (!boost::filesystem::exists("/dev/full"))
 		GTEST_SKIP() << "no /dev/full here";
 	const VScratchFolder folder;
 	const std::string command =

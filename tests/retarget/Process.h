@@ -1,7 +1,7 @@
 #pragma once
 
-#include <filesystem>
-#include <string>
+#include "../UtilsFileSystem/Folder.h"
+
 #include <vector>
 
 /// What one run of the program left behind.
@@ -12,25 +12,15 @@ struct VRun
 	std::string m_Err;
 };
 
-/// Runs the program in a folder, with nothing on its standard input.
-VRun RunRetarget(const std::vector<std::string>& i_rArguments, const std::filesystem::path& i_rFolder);
-
-/// A folder of its own for each test, removed with it.
-class VScratchFolder
+/// A folder of its own for each test, in which the program runs.
+class VScratchFolder : public VTestFolder
 {
 public:
-	VScratchFolder();
-	~VScratchFolder();
-	VScratchFolder(const VScratchFolder&) = delete;
-	VScratchFolder& operator=(const VScratchFolder&) = delete;
+	/// With nothing on the program's standard input.
+	VRun Run(const std::vector<std::string>& i_rArguments) const;
 
-	const std::filesystem::path& Path() const { return m_Path; }
-	std::filesystem::path operator/(const std::string& i_rName) const { return m_Path / i_rName; }
-	void Write(const std::string& i_rName, const std::string& i_rText) const;
-	std::string Read(const std::string& i_rName) const;
+	void Write(const std::string& i_rName, const std::string& i_rText) const { Put(*this / i_rName, i_rText); }
+	std::string Read(const std::string& i_rName) const { return Get(*this / i_rName); }
 	/// Names of all that lies in it, in order.
 	std::vector<std::string> Names() const;
-
-private:
-	std::filesystem::path m_Path;
 };

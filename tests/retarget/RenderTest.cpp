@@ -16,18 +16,15 @@
 namespace
 {
 
-const std::string c_Performer = Data("qrt/performer.qrs");
-
 /// A folder with a retarget subject in it.
 class VSubjectFolder : public VScratchFolder
 {
 public:
 	VSubjectFolder()
 	{
-		const VRun run = RunRetarget(
-		    {"-q", "create", "--fbx", Data("fbx/own_ns_yup_cm_b7400.fbx"), "--source", c_Performer, "--position",
-		        "Hips:Hips", "--symmetry", "--rotation", "LeftArm:LeftArm", "--update-targets", "-o", "x.qrr"},
-		    Path());
+		const VRun run =
+		    Run({"-q", "create", "--fbx", Data("fbx/own_ns_yup_cm_b7400.fbx"), "--source", c_Performer, "--position",
+		        "Hips:Hips", "--symmetry", "--rotation", "LeftArm:LeftArm", "--update-targets", "-o", "x.qrr"});
 		EXPECT_EQ(run.m_Status, 0) << run.m_Err;
 	}
 };
@@ -106,9 +103,8 @@ TEST(Render, DrawsWhatThePreviewShows)
 	{
 		const std::string view = CommandLine::c_Views[i];
 		SCOPED_TRACE(view);
-		const VRun run = RunRetarget({"-q", "render", "x.qrr", "--source", c_Performer, "--skins", Data("fbx"),
-		                                 "--view", view, "--size", "320x200", "-o", view + ".png"},
-		    folder.Path());
+		const VRun run = folder.Run({"-q", "render", "x.qrr", "--source", c_Performer, "--skins", Data("fbx"), "--view",
+		    view, "--size", "320x200", "-o", view + ".png"});
 		EXPECT_EQ(run.m_Status, 0) << run.m_Err;
 		const QImage drawn = QImage(QString::fromStdString((folder / (view + ".png")).string()));
 		EXPECT_EQ(drawn.convertToFormat(QImage::Format_RGB32),
@@ -121,8 +117,8 @@ TEST(Render, DrawsWhatThePreviewShows)
 	    "-q", "render", "x.qrr", "--source", c_Performer, "--view", "bottom", "--size", "320x200", "-o", "-"};
 	std::vector<std::string> skinned = bottom;
 	skinned.insert(skinned.end(), {"--skins", Data("fbx")});
-	EXPECT_EQ(RunRetarget(skinned, folder.Path()).m_Out, folder.Read("bottom.png"));
-	EXPECT_NE(RunRetarget(bottom, folder.Path()).m_Out, folder.Read("bottom.png")) << "bones alone";
+	EXPECT_EQ(folder.Run(skinned).m_Out, folder.Read("bottom.png"));
+	EXPECT_NE(folder.Run(bottom).m_Out, folder.Read("bottom.png")) << "bones alone";
 }
 
 TEST(Render, TellsWhatItLacks)

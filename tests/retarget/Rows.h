@@ -3,9 +3,9 @@
 #include "Process.h"
 
 #include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
 
-#include <string>
-#include <vector>
+using VJson = nlohmann::json;
 
 /// One run of the program in a scratch folder, and what has to come of it.
 struct VRow
@@ -26,7 +26,7 @@ inline void RunRows(const std::vector<VRow>& i_rRows, const VScratchFolder& i_rF
 	{
 		SCOPED_TRACE(rRow.m_pName);
 		const std::vector<std::string> before = i_rFolder.Names();
-		const VRun run = RunRetarget(rRow.m_Arguments, i_rFolder.Path());
+		const VRun run = i_rFolder.Run(rRow.m_Arguments);
 		EXPECT_EQ(run.m_Status, rRow.m_Status) << run.m_Err;
 		if (rRow.m_Out.empty())
 			EXPECT_EQ(run.m_Out, "");
@@ -38,6 +38,23 @@ inline void RunRows(const std::vector<VRow>& i_rRows, const VScratchFolder& i_rF
 			EXPECT_NE(run.m_Err.find(rRow.m_Err), std::string::npos) << run.m_Err;
 		EXPECT_EQ(i_rFolder.Names(), before);
 	}
+}
+
+/// The JSON that a run prints.
+inline VJson RunJson(const std::vector<std::string>& i_rArguments, const VScratchFolder& i_rFolder)
+{
+	const VRun run = i_rFolder.Run(i_rArguments);
+	EXPECT_EQ(run.m_Status, 0) << run.m_Err;
+	return VJson::parse(run.m_Out, nullptr, false);
+}
+
+/// The file's text with a part of it replaced, which must be there.
+inline std::string Replaced(const std::string& i_rPath, const std::string& i_rFrom, const std::string& i_rTo)
+{
+	std::string text = Get(i_rPath);
+	const std::size_t at = text.find(i_rFrom);
+	EXPECT_NE(at, std::string::npos) << i_rFrom;
+	return at == std::string::npos ? text : text.replace(at, i_rFrom.size(), i_rTo);
 }
 
 inline std::string Data(const std::string& i_rName)

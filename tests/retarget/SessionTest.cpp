@@ -33,11 +33,11 @@ void RunSession(const std::string& i_rPage, std::size_t i_Steps)
 	ASSERT_GE(steps.size(), i_Steps) << i_rPage;
 
 	const VScratchFolder folder;
-	std::filesystem::create_directory_symlink(RETARGET_SOURCE "/demo", folder / "demo");
+	boost::filesystem::create_directory_symlink(RETARGET_SOURCE "/demo", folder / "demo");
 	for (const VStep& rStep : steps)
 	{
 		folder.Write("step",
-		    "PATH='" + std::filesystem::path(RETARGET_PROGRAM).parent_path().string() + "':$PATH\ncd '"
+		    "PATH='" + boost::filesystem::path(RETARGET_PROGRAM).parent_path().string() + "':$PATH\ncd '"
 		        + folder.Path().string() + "'\n" + rStep.m_Command);
 		std::system(("bash '" + (folder / "step").string() + "' > '" + (folder / "out").string() + "' 2>&1").c_str());
 		EXPECT_EQ(folder.Read("out"), rStep.m_Output) << rStep.m_Command;
