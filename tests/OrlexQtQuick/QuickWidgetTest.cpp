@@ -1,8 +1,9 @@
 #include "OrlexQtQuick/QuickWidget.h"
-#include "DebugServices/GlobalLog.h"
+
+#include "../LogRecorder.h"
+#include "../QtApplication.h"
 #include "TesselPluginInterface/IQuickEngine.h"
 
-#include <QApplication>
 #include <QDateTime>
 #include <QFile>
 #include <QKeyEvent>
@@ -17,6 +18,8 @@ namespace
 {
 
 using OrlexQtQuick::VQuickWidget;
+
+[[maybe_unused]] auto* const g_pApplication = testing::AddGlobalTestEnvironment(new VQtApplication);
 
 class VEngine : public TesselPluginInterface::IQuickEngine
 {
@@ -45,15 +48,6 @@ protected:
 		file.setFileTime(QDateTime::fromSecsSinceEpoch(++m_Seconds), QFileDevice::FileModificationTime);
 	}
 	qint64 m_Seconds = 1000000000;
-
-	static void SetUpTestSuite()
-	{
-		static int s_ArgumentCount = 1;
-		static char s_Program[] = "test";
-		static char* s_Arguments[] = {s_Program, nullptr};
-		// Qt does not take a second one well, so it stays until the process ends.
-		static QApplication s_Application(s_ArgumentCount, s_Arguments);
-	}
 
 	QTemporaryDir m_Folder;
 	std::shared_ptr<VEngine> m_pDeveloper = std::make_shared<VEngine>(true);
@@ -91,14 +85,11 @@ TEST_F(QuickWidget, LoadsFromTheSourcesOnlyForADeveloper)
 
 	const auto pUser = std::make_shared<VEngine>(false);
 	VQuickWidget user(pUser);
-	int errors = 0;
-	const auto pSink =
-	    NVX::GlobalLog::AddSink([&errors](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string&)
-	        { errors += i_rCategory.Name() == "QuickWidget" && i_Level == NVX::ELogError; });
+	VLogRecorder log(NVX::ELogError);
 	user.Load(m_Folder.path(), "Panel.qml");
 	EXPECT_EQ(user.source(), QUrl("qrc:/Panel.qml"));
 	EXPECT_FALSE(user.rootObject());
-	EXPECT_EQ(errors, 1) << "a file that is nowhere is told";
+	EXPECT_EQ(log.Take().find("2 QuickWidget: "), 0u) << "a file that is nowhere is told";
 }
 
 TEST_F(QuickWidget, SettingAPropertyAgainIsTakenAnew)

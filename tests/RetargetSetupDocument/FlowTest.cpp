@@ -1,119 +1,23 @@
-// The document from end to end on files: an FBX file and a performer in, a retarget subject out and in again.
+// The document on files.
 
-#include "CoreOrlexQRTIO/FileDifference.h"
 #include "TestDocument.h"
 
 #include "CoreOrlexTypes/SubjectRecord.h"
 #include "CoreOrlexTypes/TextForm.h"
 #include "RetargetSetupDocument/FilePath.h"
 
-#include <boost/filesystem/fstream.hpp>
-
-#include <algorithm>
-#include <sstream>
+#include <limits>
 
 namespace
 {
 
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
-using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
 
 const boost::filesystem::path c_Demo = RETARGET_SOURCE "/demo";
 const boost::filesystem::path c_Cases = RETARGET_TEST_DATA "/fbx/cases";
 
-int IndexOf(const VSubjectParametrised& i_rSubject, const std::string& i_rName)
-{
-	const auto found = std::find_if(i_rSubject.m_Segments.begin(), i_rSubject.m_Segments.end(),
-	    [&i_rName](const auto& i_rSegment) { return i_rSegment.m_Name == i_rName; });
-	return found == i_rSubject.m_Segments.end() ? -1 : int(found - i_rSubject.m_Segments.begin());
-}
-
-std::string ReadBytes(const boost::filesystem::path& i_rPath)
-{
-	boost::filesystem::ifstream stream(i_rPath, std::ios::binary);
-	return {std::istreambuf_iterator<char>(stream), {}};
-}
-
-class Flow : public VDocumentTest
-{
-protected:
-	void WriteBytes(const boost::filesystem::path& i_rPath, const std::string& i_rBytes)
-	{
-		boost::filesystem::ofstream(i_rPath, std::ios::binary) << i_rBytes;
-	}
-
-	/// The pairs of the demo's mapping file, through the commands that QML calls.
-	void AddDemoTargets()
-	{
-		std::stringstream mapping(ReadBytes(c_Demo / "mapping.txt"));
-		VSubjectParametrised source;
-		ASSERT_TRUE(m_Document.GetSourceSubject(source));
-		bool bSymmetry = false;
-		for (std::string option, pair; mapping >> option;)
-		{
-			if (option == "--symmetry" || option == "--no-symmetry")
-			{
-				bSymmetry = option == "--symmetry";
-				continue;
-			}
-			mapping >> pair;
-			const std::size_t colon = pair.find(':');
-			const int sourceIndex = IndexOf(source, pair.substr(0, colon));
-			const int targetIndex = IndexOf(Target(), pair.substr(colon + 1));
-			ASSERT_TRUE(sourceIndex >= 0 && targetIndex >= 0) << pair;
-			QMetaObject::invokeMethod(&m_Document, "AddTarget", Q_ARG(int, sourceIndex), Q_ARG(int, targetIndex),
-			    Q_ARG(bool, option == "--position"), Q_ARG(bool, bSymmetry));
-		}
-	}
-};
-
-TEST_F(Flow, FromFBXToASavedSubjectAndBack)
-{
-	ASSERT_TRUE(m_Document.LoadSourceSubject(c_Demo / "performer.qrs", "Actor"));
-	EXPECT_EQ(m_Document.GetSourceName(), "performer");
-	EXPECT_EQ(m_Document.SourceValues().m_pApplicationData->m_Skin, "Actor");
-	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Demo / "character.fbx"));
-	EXPECT_TRUE(m_Document.IsTargetFBXComplete());
-	EXPECT_FALSE(m_Document.TargetValues().m_pParametrised) << "nothing is made before it is asked for";
-	m_Document.CreateTargetSubject();
-	EXPECT_EQ(Target().m_Segments.size(), 39u);
-	EXPECT_EQ(Target().m_SubjectId, 0x0FFFFFFFu);
-
-	AddDemoTargets();
-	EXPECT_EQ(Target().m_Targets.size(), 34u);
-	m_Document.RemoveUnnecessaryJoints();
-	m_Document.UpdateTargets();
-	const VSubjectParametrised pruned = Target();
-	const auto jointCount = std::count_if(pruned.m_Segments.begin(), pruned.m_Segments.end(),
-	    [](const auto& i_rSegment) { return i_rSegment.m_Joint.m_JointType != VJoint::EDummy; });
-	EXPECT_GT(jointCount, 10);
-	EXPECT_LT(jointCount, 39);
-
-	const boost::filesystem::path file = m_Folder / "Kästrel.v1.qrr";
-	const QUrl url = QUrl::fromLocalFile(QString::fromStdString(file.string()));
-	m_Document.SaveTargetSubjectURL(url);
-	const std::string bytes = ReadBytes(file);
-	ASSERT_FALSE(bytes.empty());
-
-	VRetargetSetup other(m_Host.GetDispatcher(), m_Host.GetFrameFactory(), m_Host.GetItemFactory());
-	other.LoadTargetSubjectURL(url);
-	EXPECT_EQ(other.GetSourceName(), "performer");
-	VSubjectParametrised subject;
-	VSubjectApplicationData data;
-	ASSERT_TRUE(other.GetTargetSubjectAndData(subject, data));
-	EXPECT_EQ(data.m_Skin, "character");
-	const VSubjectApplicationData& rSavedData = *m_Document.TargetValues().m_pApplicationData;
-	EXPECT_EQ(CoreOrlexQRTIO::FileDifference({Target(), rSavedData}, {subject, data}), "");
-
-	ASSERT_EQ(other.SaveTargetSubject(m_Folder / "again.qrr"), 0u);
-	EXPECT_EQ(ReadBytes(m_Folder / "again.qrr"), bytes);
-	// Edits go on where the file left off.
-	ASSERT_TRUE(other.LoadSourceSubject(c_Demo / "performer.qrs", ""));
-	other.UpdateTargets();
-	ASSERT_TRUE(other.GetTargetSubject(subject));
-	EXPECT_EQ(CoreOrlexQRTIO::FileDifference({Target(), data}, {subject, data}), "");
-}
+using Flow = VDocumentTest;
 
 TEST_F(Flow, TheRootTakesItsPlaceInAWorldWithZUp)
 {
@@ -211,18 +115,16 @@ TEST_F(Flow, FilesThatCannotBeReadChangeNothing)
 {
 	SetSmallSubjects();
 	const auto before = m_Document.TargetValues();
-	WriteBytes(m_Folder / "text.qrr", "no subject");
-	WriteBytes(m_Folder / "legacy.QRX", "[[1,0,1],\"\"]{}");
-	WriteBytes(m_Folder / "newer.qrx", "[[1,0,2],\"\"]{}");
+	Put(m_Folder / "text.qrr", "no subject");
+	Put(m_Folder / "legacy.QRX", "[[1,0,1],\"\"]{}");
+	Put(m_Folder / "newer.qrx", "[[1,0,2],\"\"]{}");
 	const std::pair<boost::filesystem::path, std::uint32_t> rows[] = {{m_Folder / "missing.qrr", 0x80000000u},
-	    {m_Folder / "text.qrr", 0x80000000u}, {m_Folder, 0x80000000u}, {m_Folder / "legacy.QRX", 0x80000000u},
+	    {m_Folder / "text.qrr", 0x80000000u}, {m_Folder.Path(), 0x80000000u}, {m_Folder / "legacy.QRX", 0x80000000u},
 	    {m_Folder / "missing.qrx", 0x8000002Au}, {m_Folder / "newer.qrx", 0x80000018u}};
 	const VLogRecorder quiet;
 	for (const auto& [path, status] : rows)
 		EXPECT_EQ(m_Document.LoadTargetSubject(path), status) << path;
 	EXPECT_FALSE(m_Document.LoadSourceSubject(m_Folder / "text.qrr", ""));
-	m_Document.LoadTargetSubjectURL(QUrl("http://example.com/a.qrr"));
-	m_Document.LoadTargetSubjectURL(QUrl());
 	EXPECT_EQ(m_Document.TargetValues().m_pParametrised, before.m_pParametrised);
 	EXPECT_EQ(m_Document.GetSourceName(), "");
 	EXPECT_EQ(m_Changes, 0);
@@ -236,12 +138,13 @@ TEST_F(Flow, ALegacyFileBecomesASubjectOfToday)
 	{
 		rSegment.m_Joint.m_TPoseMean = rSegment.m_Joint.m_BindPose;
 		rSegment.m_Joint.m_TPoseMean[0] = 0.25;
+		rSegment.m_Joint.m_TPoseCovariance = {7};
 		rSegment.m_Joint.m_BindPose.clear();
 	}
 	record.m_SubjectApplicationData.m_RetargetSourceTemplate = "Anna";
 	std::string text = "{\"Version\":[1,0,1],\"Schema\":\"any\"}\n";
 	ASSERT_TRUE(CoreOrlexTypes::WriteText(record, text, CoreOrlexTypes::ETextSpelling::EPositional));
-	WriteBytes(m_Folder / "old.qrx", text);
+	Put(m_Folder / "old.qrx", text);
 
 	std::string names;
 	const auto note = [&] { names += "'" + m_Document.GetSourceName() + "'"; };
@@ -256,6 +159,7 @@ TEST_F(Flow, ALegacyFileBecomesASubjectOfToday)
 	EXPECT_EQ(names, "'''Anna'") << "published first; a queued callback sees the new name";
 	EXPECT_EQ(Target().m_Segments[1].m_Joint.m_BindPose, (std::vector<double>{0.25, 0, 0}));
 	EXPECT_TRUE(Target().m_Segments[1].m_Joint.m_TPoseMean.empty());
+	EXPECT_TRUE(Target().m_Segments[1].m_Joint.m_TPoseCovariance.empty());
 	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "new.qrr"), 0u);
 	EXPECT_EQ(m_Document.LoadTargetSubject(m_Folder / "new.qrr"), 0u);
 	EXPECT_EQ(m_Document.GetSourceName(), "Anna");
@@ -300,16 +204,16 @@ TEST_F(Flow, AFailedSaveLeavesTheFile)
 {
 	SetSmallSubjects();
 	ASSERT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0u);
-	const std::string bytes = ReadBytes(m_Folder / "a.qrr");
+	const std::string bytes = Get(m_Folder / "a.qrr");
 	VSubjectParametrised subject = Target();
 	subject.m_Segments[0].m_Joint.m_Mean[0] = std::numeric_limits<double>::infinity();
 	m_Document.SetTargetSubjectParametrised(subject);
 	VLogRecorder log;
 	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0x80000020u);
 	EXPECT_NE(log.Take().find("Could not stringify"), std::string::npos);
-	EXPECT_EQ(ReadBytes(m_Folder / "a.qrr"), bytes);
+	EXPECT_EQ(Get(m_Folder / "a.qrr"), bytes);
 	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "missing" / "a.qrr"), 0x80000020u);
-	EXPECT_EQ(std::distance(boost::filesystem::directory_iterator(m_Folder), {}), 1) << "nothing is left behind";
+	EXPECT_EQ(m_Folder.Count(), 1) << "nothing is left behind";
 }
 
 TEST_F(Flow, NamesUsedTwiceAreToldAtSave)

@@ -1,12 +1,10 @@
 #include "RetargetSetupDocument/LegacyText.h"
 
+#include "../UtilsFileSystem/Folder.h"
 #include "CoreOrlexTypes/TextForm.h"
 #include "TestSubjects.h"
 
 #include <gtest/gtest.h>
-
-#include <boost/filesystem/fstream.hpp>
-#include <boost/filesystem/operations.hpp>
 
 namespace
 {
@@ -86,26 +84,7 @@ TEST(RepairLegacyRecord, TellsEachThingThatItBringsIntoLine)
 	EXPECT_EQ(log.Take(), "");
 }
 
-class LegacyFile : public testing::Test
-{
-protected:
-	void SetUp() override
-	{
-		m_Folder = boost::filesystem::temp_directory_path() / boost::filesystem::unique_path();
-		boost::filesystem::create_directories(m_Folder);
-	}
-	void TearDown() override { boost::filesystem::remove_all(m_Folder); }
-
-	boost::filesystem::path Write(const std::string& i_rText)
-	{
-		boost::filesystem::ofstream(m_Folder / "a.qrx", std::ios::binary) << i_rText;
-		return m_Folder / "a.qrx";
-	}
-
-	boost::filesystem::path m_Folder;
-};
-
-TEST_F(LegacyFile, EveryTruncationIsRefusedAndTold)
+TEST(LegacyFile, EveryTruncationIsRefusedAndTold)
 {
 	std::string text = "[[1,0,1],\"\"]\n";
 	ASSERT_TRUE(CoreOrlexTypes::WriteText(Foreign(), text));
@@ -114,23 +93,29 @@ TEST_F(LegacyFile, EveryTruncationIsRefusedAndTold)
 		VSubjectRecord record;
 		EXPECT_EQ(ParseLegacyText(std::string_view(text).substr(0, length), record), 0x80000000u) << length;
 	}
+	const VTestFolder folder;
+	const boost::filesystem::path file = folder / "a.qrx";
+	const auto read = [&file](const std::string& i_rText, VSubjectRecord& o_rRecord)
+	{
+		Put(file, i_rText);
+		return ReadLegacyFile(file, o_rRecord);
+	};
 	VLogRecorder log;
 	VSubjectRecord record;
-	EXPECT_EQ(ReadLegacyFile(Write(text.substr(0, 200)), record), 0x80000000u);
-	EXPECT_EQ(log.Take(),
-	    "2 RetargetSetup: '" + (m_Folder / "a.qrx").string() + "' is not a legacy subject file, or is damaged");
-	EXPECT_EQ(ReadLegacyFile(Write("[[1,0,2],\"\"]"), record), 0x80000018u);
-	EXPECT_EQ(log.Take(),
-	    "2 RetargetSetup: The legacy file '" + (m_Folder / "a.qrx").string() + "' is of a later version than 1.0.1");
-	EXPECT_EQ(ReadLegacyFile(Write(text), record), 0u);
+	EXPECT_EQ(read(text.substr(0, 200), record), 0x80000000u);
+	EXPECT_EQ(log.Take(), "2 RetargetSetup: '" + file.string() + "' is not a legacy subject file, or is damaged");
+	EXPECT_EQ(read("[[1,0,2],\"\"]", record), 0x80000018u);
+	EXPECT_EQ(log.Take(), "2 RetargetSetup: The legacy file '" + file.string() + "' is of a later version than 1.0.1");
+	EXPECT_EQ(read(text, record), 0u);
 	VSubjectRecord expected = Foreign();
 	RepairLegacyRecord(expected);
 	EXPECT_EQ(record, expected);
 }
 
-TEST_F(LegacyFile, WhatCannotBeOpenedIsTold)
+TEST(LegacyFile, WhatCannotBeOpenedIsTold)
 {
-	for (const boost::filesystem::path& rPath : {m_Folder / "missing.qrx", m_Folder})
+	const VTestFolder folder;
+	for (const boost::filesystem::path& rPath : {folder / "missing.qrx", folder.Path()})
 	{
 		VLogRecorder log;
 		VSubjectRecord record;
@@ -140,7 +125,7 @@ TEST_F(LegacyFile, WhatCannotBeOpenedIsTold)
 	}
 }
 
-TEST_F(LegacyFile, ABombOfListsIsRefused)
+TEST(LegacyFile, ABombOfListsIsRefused)
 {
 	std::string text = R"([[1,0,1],""]{"SubjectParametrised":{"Segments":[{})";
 	for (int i = 0; i < 2000000; ++i)

@@ -1,12 +1,11 @@
 #pragma once
 
+#include "../UtilsFileSystem/Folder.h"
 #include "InMemoryHost/PluginContext.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "TestSubjects.h"
 
 #include <gtest/gtest.h>
-
-#include <boost/filesystem/operations.hpp>
 
 /// A document in an in-memory host, and a folder of its own for files.
 class VDocumentTest : public testing::Test
@@ -14,10 +13,8 @@ class VDocumentTest : public testing::Test
 protected:
 	VDocumentTest()
 	{
-		boost::filesystem::create_directories(m_Folder);
 		m_Document.GetChangedSignal().Connect([this] { ++m_Changes; });
 	}
-	~VDocumentTest() override { boost::filesystem::remove_all(m_Folder); }
 
 	CoreOrlexTypes::VSubjectParametrised Target() const
 	{
@@ -43,8 +40,7 @@ protected:
 		m_Changes = 0;
 	}
 
-	const boost::filesystem::path m_Folder =
-	    boost::filesystem::temp_directory_path() / boost::filesystem::unique_path("document-%%%%%%%%");
+	VTestFolder m_Folder;
 	/// Keeps what the readers tell of our own files out of the tests' output.
 	VLogRecorder m_Quiet;
 	InMemoryHost::VPluginContext m_Host;

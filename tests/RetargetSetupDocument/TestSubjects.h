@@ -1,43 +1,15 @@
 #pragma once
 
+#include "../LogRecorder.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
-#include "DebugServices/GlobalLog.h"
 #include "FBXIO/SkinSkeleton.h"
 #include "RetargetSetupDocument/GlobalScale.h"
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/Joints.h"
 
 #include <initializer_list>
-#include <memory>
 #include <string>
-#include <vector>
-
-/// What the log receives while this lives, one line for each message, as "3 RetargetSetup: text".
-class VLogRecorder
-{
-public:
-	VLogRecorder()
-	    : m_pToken(NVX::GlobalLog::AddSink(
-	        [this](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)
-	        { m_Lines.push_back(std::to_string(i_Level) + " " + i_rCategory.Name() + ": " + i_rMessage); }))
-	{
-	}
-
-	/// The lines so far, which are then forgotten.
-	std::string Take()
-	{
-		std::string text;
-		for (const std::string& rLine : m_Lines)
-			text += (text.empty() ? "" : "\n") + rLine;
-		m_Lines.clear();
-		return text;
-	}
-
-private:
-	std::vector<std::string> m_Lines;
-	std::shared_ptr<void> m_pToken;
-};
 
 struct VTestSegment
 {

@@ -1,7 +1,6 @@
-#include "TesselPluginRetargetSetup/BoneList.h"
+#include "../UtilsFileSystem/Folder.h"
 #include "TesselPluginRetargetSetup/ProductFolders.h"
 
-#include <boost/filesystem.hpp>
 #include <gtest/gtest.h>
 
 namespace
@@ -9,53 +8,27 @@ namespace
 
 namespace fs = boost::filesystem;
 
-class ProductFolders : public testing::Test
+TEST(ProductFolders, AreThoseThatAreThereInTheOrderOfTheProducts)
 {
-protected:
-	void SetUp() override { fs::create_directories(m_Root); }
-	void TearDown() override { fs::remove_all(m_Root); }
-
-	const fs::path m_Root = fs::temp_directory_path() / fs::unique_path("products-%%%%%%%%");
-};
-
-TEST_F(ProductFolders, TakesWhatIsThereInTheOrderOfTheProducts)
-{
-	const fs::path rally = m_Root / "rally";
-	const fs::path stage = m_Root / "stage";
+	const VTestFolder root;
+	const fs::path rally = root / "rally";
+	const fs::path stage = root / "stage";
 	fs::create_directories(rally / "Configuration" / "ModelTemplates");
 	fs::create_directories(stage / "Configuration" / "ModelTemplates");
 	fs::create_directories(stage / "Configuration" / "Skins");
+	std::vector<std::string> asked;
 	const auto both = RetargetSetup::InstalledFolders(
-	    [&](const std::string& i_rName) { return i_rName == "Orlex Rally" ? rally : stage; });
+	    [&](const std::string& i_rName)
+	    {
+		    asked.push_back(i_rName);
+		    return i_rName == "Orlex Rally" ? rally : stage;
+	    });
+	EXPECT_EQ(asked, (std::vector<std::string>{"Orlex Rally", "Orlex Stage"}));
 	EXPECT_EQ(both.m_Models,
 	    (std::vector<fs::path>{rally / "Configuration/ModelTemplates", stage / "Configuration/ModelTemplates"}));
 	EXPECT_EQ(both.m_Skins, std::vector<fs::path>{stage / "Configuration/Skins"}) << "one product has no skins";
-
-	std::vector<std::string> asked;
-	const auto none = RetargetSetup::InstalledFolders(
-	    [&asked](const std::string& i_rName)
-	    {
-		    asked.push_back(i_rName);
-		    return fs::path();
-	    });
+	const auto none = RetargetSetup::InstalledFolders([](const std::string&) { return fs::path(); });
 	EXPECT_TRUE(none.m_Models.empty() && none.m_Skins.empty());
-	EXPECT_EQ(asked, (std::vector<std::string>{"Orlex Rally", "Orlex Stage"}));
-}
-
-TEST(BoneList, IndentsByTheDepthInTheTree)
-{
-	FBXIO::VSkinSkeleton skeleton(5);
-	const char* const names[] = {"hips", "ns:spine", "head", "leg", "prop"};
-	const std::int64_t parents[] = {-1, 0, 1, 0, -1};
-	for (std::size_t i = 0; i < skeleton.size(); ++i)
-	{
-		skeleton[i].m_Name = names[i];
-		skeleton[i].m_ParentIndex = parents[i];
-	}
-	EXPECT_EQ(RetargetSetup::BoneListForEnum(skeleton),
-	    (std::vector<std::pair<std::string, std::uint32_t>>{
-	        {"hips", 0}, {" ns:spine", 1}, {"  head", 2}, {" leg", 3}, {"prop", 4}}));
-	EXPECT_TRUE(RetargetSetup::BoneListForEnum({}).empty());
 }
 
 } // namespace

@@ -1,5 +1,6 @@
 // The panel's parameters: what they are called, where their values come from.
 
+#include "../UtilsFileSystem/Folder.h"
 #include "TestHost.h"
 
 #include "TesselParameters/ParameterGroup.h"
@@ -7,8 +8,6 @@
 #include "TesselPluginInterface/IParameter.h"
 #include "TesselPluginRetargetSetup/PanelParameters.h"
 
-#include <boost/filesystem.hpp>
-#include <boost/filesystem/fstream.hpp>
 #include <gtest/gtest.h>
 
 namespace
@@ -22,14 +21,11 @@ using namespace TesselPluginInterface;
 class PanelParameters : public testing::Test
 {
 protected:
-	PanelParameters() { fs::create_directories(m_Root); }
-	~PanelParameters() override { fs::remove_all(m_Root); }
-
-	fs::path Touch(const fs::path& i_rFile)
+	fs::path Touch(const std::string& i_rFile)
 	{
 		const fs::path file = m_Root / i_rFile;
 		fs::create_directories(file.parent_path());
-		fs::ofstream(file) << "x";
+		Put(file, "x");
 		return file;
 	}
 
@@ -46,7 +42,7 @@ protected:
 		return names;
 	}
 
-	const fs::path m_Root = fs::temp_directory_path() / fs::unique_path("panel-%%%%%%%%");
+	const VTestFolder m_Root;
 	VTestContext m_Context;
 };
 

@@ -1,33 +1,18 @@
 #include "TestHost.h"
 
+#include "../QtApplication.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "OrlexGraphics/SceneFramebufferObject.h"
 #include "OrlexGraphics/SkinCache.h"
 #include "TesselParametersGUI/ParameterGroupModel.h"
 #include "studio/qmltypes/QmlModules.h"
 
-#include <QApplication>
 #include <QtQml>
-#include <gtest/gtest.h>
 
 namespace
 {
 
-/// One for all tests of the process, which ends before Qt's own statics do.
-class VApplication : public testing::Environment
-{
-public:
-	void SetUp() override { m_pApplication = std::make_unique<QApplication>(m_Count, m_pArguments); }
-	void TearDown() override { m_pApplication.reset(); }
-
-private:
-	int m_Count = 1;
-	char m_Name[5] = "test";
-	char* m_pArguments[2] = {m_Name, nullptr};
-	std::unique_ptr<QApplication> m_pApplication;
-};
-
-testing::Environment* const g_pApplication = testing::AddGlobalTestEnvironment(new VApplication);
+[[maybe_unused]] auto* const g_pApplication = testing::AddGlobalTestEnvironment(new VQtApplication);
 
 } // namespace
 

@@ -1,36 +1,10 @@
 #include "TestPanel.h"
 
-#include "DebugServices/GlobalLog.h"
+#include "../FindItem.h"
 #include "OrlexGraphics/SceneFramebufferObject.h"
 #include "RetargetSetupDocument/Identity.h"
 
 #include <QtQml>
-
-namespace
-{
-
-QQuickItem* Find(QQuickItem* i_pItem, const QString& i_rObjectName)
-{
-	if (i_pItem->objectName() == i_rObjectName)
-		return i_pItem;
-	for (QQuickItem* const pChild : i_pItem->childItems())
-		if (QQuickItem* const pFound = Find(pChild, i_rObjectName))
-			return pFound;
-	return nullptr;
-}
-
-} // namespace
-
-VPanelTest::VPanelTest()
-    : m_pLogToken(NVX::GlobalLog::AddSink(
-        [this](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)
-        {
-	        if (i_rCategory.Name() != "Tessel")
-		        m_Log.push_back(std::to_string(i_Level) + " " + i_rCategory.Name() + ": " + i_rMessage);
-        }))
-{
-	boost::filesystem::create_directories(m_Folder);
-}
 
 VPanelTest::~VPanelTest()
 {
@@ -42,7 +16,6 @@ VPanelTest::~VPanelTest()
 	m_pDocument.reset();
 	Run();
 	m_pGui.reset();
-	boost::filesystem::remove_all(m_Folder);
 }
 
 void VPanelTest::Open(bool i_bModules)
@@ -64,7 +37,7 @@ void VPanelTest::Open(bool i_bModules)
 
 QQuickItem* VPanelTest::Item(const QString& i_rObjectName) const
 {
-	QQuickItem* const pItem = m_pWidget->rootObject() ? Find(m_pWidget->rootObject(), i_rObjectName) : nullptr;
+	QQuickItem* const pItem = m_pWidget->rootObject() ? FindItem(m_pWidget->rootObject(), i_rObjectName) : nullptr;
 	EXPECT_TRUE(pItem) << i_rObjectName.toStdString();
 	return pItem;
 }
@@ -96,15 +69,6 @@ void VPanelTest::Select(std::uint32_t i_Kind, std::uint32_t i_Index)
 	rSelection.Remove(rSelection.ItemsOfKind(i_Kind));
 	rSelection.Add({{i_Kind, RetargetSetup::c_SubjectId, i_Index, {}}});
 	Run();
-}
-
-std::string VPanelTest::TakeLog()
-{
-	std::string text;
-	for (const std::string& rLine : m_Log)
-		text += (text.empty() ? "" : "\n") + rLine;
-	m_Log.clear();
-	return text;
 }
 
 CoreOrlexTypes::VSubjectParametrised VPanelTest::Target() const

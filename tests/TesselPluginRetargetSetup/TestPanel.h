@@ -1,5 +1,7 @@
 #pragma once
 
+#include "../LogRecorder.h"
+#include "../UtilsFileSystem/Folder.h"
 #include "TestHost.h"
 
 #include "RetargetSetupDocument/RetargetSetup.h"
@@ -10,17 +12,14 @@
 #include "TesselPluginRetargetSetup/RetargetSetupWidget.h"
 
 #include <QQuickItem>
-#include <boost/filesystem.hpp>
 #include <gtest/gtest.h>
 
 #include <string>
-#include <vector>
 
 /// The panel in a test host, with a folder for its files. Nothing has been posted that has not run.
 class VPanelTest : public testing::Test
 {
 protected:
-	VPanelTest();
 	~VPanelTest() override;
 
 	/// Makes the panel, with what is in the store and the preferences then.
@@ -39,26 +38,22 @@ protected:
 	void Select(std::uint32_t i_Kind, std::uint32_t i_Index);
 	void Run() { RunAll(m_Context); }
 
-	/// What was told to the log since the last call, without the category "Tessel" of folders.
-	std::string TakeLog();
+	/// What was told to the log since the last call, without the category of folders.
+	std::string TakeLog() { return m_Log.Take(); }
 
 	CoreOrlexTypes::VSubjectParametrised Target() const;
 
 	/// Of the document, performer and character.
 	void OpenDemo();
 
-	const boost::filesystem::path m_Folder =
-	    boost::filesystem::temp_directory_path() / boost::filesystem::unique_path("panel-%%%%%%%%");
+	const VTestFolder m_Folder;
+	VLogRecorder m_Log{NVX::ELogDetail, "Tessel"};
 	VTestContext m_Context;
 	std::unique_ptr<VTestGui> m_pGui;
 	std::shared_ptr<VRetargetSetup> m_pDocument;
 	std::shared_ptr<VRetargetSetupSelection> m_pSelection;
 	std::shared_ptr<VRetargetSetupScene> m_pScene;
 	std::unique_ptr<VRetargetSetupWidget> m_pWidget;
-
-private:
-	std::vector<std::string> m_Log;
-	std::shared_ptr<void> m_pLogToken;
 };
 
 inline const std::string c_DemoSource = RETARGET_SOURCE "/demo/performer.qrs";

@@ -1,26 +1,14 @@
 #include "NVX/Signal.h"
+#include "InMemoryHost/Dispatcher.h"
 
 #include <gtest/gtest.h>
 
-#include <deque>
 #include <string>
 
 namespace
 {
 
-class VQueue : public TesselPluginInterface::IDispatcher
-{
-public:
-	void Post(std::function<void()> i_Callback) override { m_Posted.push_back(std::move(i_Callback)); }
-
-	void Run()
-	{
-		for (; !m_Posted.empty(); m_Posted.pop_front())
-			m_Posted.front()();
-	}
-
-	std::deque<std::function<void()>> m_Posted;
-};
+using VQueue = InMemoryHost::VDispatcher;
 
 class VListener : public NVX::VShared
 {
@@ -42,7 +30,7 @@ TEST(Signal, CallsAtOnceOrThroughTheDispatcher)
 	signal.Connect([&heard](const std::string& i_rText) { heard += "at once " + i_rText + ";"; });
 	signal.Fire("a");
 	EXPECT_EQ(heard, "at once a;");
-	pQueue->Run();
+	pQueue->RunPending();
 	EXPECT_EQ(heard, "at once a;posted a;");
 }
 
@@ -62,7 +50,7 @@ TEST(Signal, DropsACallbackWhoseObjectIsGoneAndCallsTheOthers)
 	signal.Fire();
 	EXPECT_EQ(heard, 1);
 	EXPECT_EQ(signal.Count(), 2u) << "the posted one has not been called yet";
-	pQueue->Run();
+	pQueue->RunPending();
 	EXPECT_EQ(heard, 1);
 	EXPECT_EQ(signal.Count(), 1u);
 }
@@ -76,9 +64,9 @@ TEST(Signal, ADisconnectedCallbackIsNotCalledEvenWhenItWasPosted)
 	signal.Fire();
 	EXPECT_TRUE(connection.IsConnected());
 	connection.Disconnect();
-	pQueue->Run();
+	pQueue->RunPending();
 	signal.Fire();
-	EXPECT_TRUE(pQueue->m_Posted.empty());
+	EXPECT_EQ(pQueue->PendingCount(), 0u);
 	EXPECT_EQ(heard, 0);
 }
 

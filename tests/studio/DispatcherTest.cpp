@@ -47,7 +47,7 @@ TEST(QtDispatcher, GoesOnAfterACallbackThatThrows)
 	dispatcher.Post([&] { bRan = true; });
 	RunEvents();
 	EXPECT_TRUE(bRan);
-	EXPECT_EQ(messages.Take(), "System: A posted callback failed: no luck\n");
+	EXPECT_EQ(messages.Take(), "2 System: A posted callback failed: no luck");
 }
 
 TEST(QtDispatcher, RunsNothingAfterItsEnd)

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "DebugServices/GlobalLog.h"
+#include "../LogRecorder.h"
 
 #include <QCoreApplication>
 #include <QDir>
@@ -10,7 +10,6 @@
 
 #include <gtest/gtest.h>
 
-#include <mutex>
 #include <string>
 #include <vector>
 
@@ -30,30 +29,10 @@ struct VScratchSettings
 	QSettings m_Settings{m_Folder.filePath(QStringLiteral("studio.ini")), QSettings::IniFormat};
 };
 
-/// The messages of warnings and errors while it lives, as "category: text".
-class VMessages
+/// Warnings and errors.
+struct VMessages : VLogRecorder
 {
-public:
-	VMessages()
-	    : m_pSink(NVX::GlobalLog::AddSink(
-	        [this](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rText)
-	        {
-		        const std::lock_guard lock(m_Mutex);
-		        if (i_Level <= NVX::ELogWarning)
-			        m_Texts += i_rCategory.Name() + ": " + i_rText + "\n";
-	        }))
-	{
-	}
-	std::string Take()
-	{
-		const std::lock_guard lock(m_Mutex);
-		return std::exchange(m_Texts, {});
-	}
-
-private:
-	std::mutex m_Mutex;
-	std::string m_Texts;
-	const std::shared_ptr<void> m_pSink;
+	VMessages() : VLogRecorder(NVX::ELogWarning) {}
 };
 
 inline QByteArray ReadFile(const QString& i_rPath)

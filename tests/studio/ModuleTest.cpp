@@ -76,7 +76,7 @@ TEST(Modules, LiveInAWindow)
 
 	EXPECT_TRUE(window.Execute("Workspace3d:FrameSelected"));
 	EXPECT_FALSE(window.Execute("Workspace3d:frameselected"));
-	EXPECT_EQ(messages.Take(), "Command: Nothing happened: no panel knows the command \"Workspace3d:frameselected\"\n");
+	EXPECT_EQ(messages.Take(), "3 Command: Nothing happened: no panel knows the command \"Workspace3d:frameselected\"");
 	window.Context().Preferences().SetFolder("FolderSkins", "/skins");
 	RunEvents();
 	// On its way when the module is unloaded.
@@ -112,7 +112,7 @@ TEST(Modules, ThatFailLeaveAWindowThatTellsWhy)
 	EXPECT_TRUE(window.findChild<QLabel*>("Notice")->text().contains("could not make its panels"));
 	EXPECT_NE(messages.Take().find("could not make its panels"), std::string::npos);
 	EXPECT_FALSE(window.Open("/a.qrr"));
-	EXPECT_EQ(messages.Take(), "Import: /a.qrr cannot be opened: no module with a retarget panel is loaded\n");
+	EXPECT_EQ(messages.Take(), "2 Import: /a.qrr cannot be opened: no module with a retarget panel is loaded");
 }
 
 TEST(Modules, ThePanelComesAndGoes)

@@ -61,7 +61,7 @@ TEST(JobRunner, RunsJobsBesideTheThreadOfTheWindow)
 	bool bCompleted = false;
 	runner.Run([] { throw std::runtime_error("no disk"); }, [&] { bCompleted = true; }, pDispatcher);
 	EXPECT_TRUE(QTest::qWaitFor([&] { return bCompleted; }, 20000)) << "whoever waits goes on";
-	EXPECT_EQ(messages.Take(), "System: A job in the background failed: no disk\n");
+	EXPECT_EQ(messages.Take(), "2 System: A job in the background failed: no disk");
 }
 
 } // namespace

@@ -1,46 +1,16 @@
 #include "QmlPage.h"
 
+#include "../FindItem.h"
+#include "../QtApplication.h"
 #include "../WaitFor.h"
 
-#include <gtest/gtest.h>
-
-#include <QApplication>
 #include <QQmlContext>
 #include <QTest>
 
 namespace
 {
 
-/// One application for all tests of the process; the controls need no OpenGL.
-class VApplication : public testing::Environment
-{
-public:
-	void SetUp() override
-	{
-		qputenv("QT_XCB_GL_INTEGRATION", "none");
-		QQuickWindow::setSceneGraphBackend(QSGRendererInterface::Software);
-		m_pApplication = std::make_unique<QApplication>(m_Count, m_pArguments);
-	}
-	void TearDown() override { m_pApplication.reset(); }
-
-private:
-	char m_Name[8] = "test";
-	char* m_pArguments[2] = {m_Name, nullptr};
-	int m_Count = 1;
-	std::unique_ptr<QApplication> m_pApplication;
-};
-
-testing::Environment* const g_pApplication = testing::AddGlobalTestEnvironment(new VApplication);
-
-QQuickItem* Find(QQuickItem* i_pItem, const QString& i_rObjectName, bool i_bVisible)
-{
-	if (i_pItem->objectName() == i_rObjectName && (!i_bVisible || i_pItem->isVisible()))
-		return i_pItem;
-	for (QQuickItem* pChild : i_pItem->childItems())
-		if (QQuickItem* const pFound = Find(pChild, i_rObjectName, i_bVisible))
-			return pFound;
-	return nullptr;
-}
+[[maybe_unused]] auto* const g_pApplication = testing::AddGlobalTestEnvironment(new VQtApplication(DrawWithoutOpenGL));
 
 } // namespace
 
@@ -94,14 +64,14 @@ bool VQmlPage::Show(const QString& i_rQml)
 
 bool VQmlPage::Has(const QString& i_rObjectName) const
 {
-	return Find(m_pView->contentItem(), i_rObjectName, true);
+	return FindItem(m_pView->contentItem(), i_rObjectName, true);
 }
 
 QQuickItem* VQmlPage::Item(const QString& i_rObjectName) const
 {
-	QQuickItem* pItem = Find(m_pView->contentItem(), i_rObjectName, true);
+	QQuickItem* pItem = FindItem(m_pView->contentItem(), i_rObjectName, true);
 	if (!pItem)
-		pItem = Find(m_pView->contentItem(), i_rObjectName, false);
+		pItem = FindItem(m_pView->contentItem(), i_rObjectName, false);
 	EXPECT_TRUE(pItem) << i_rObjectName.toStdString();
 	return pItem;
 }

@@ -54,6 +54,21 @@ const char* const c_Table = R"(
 		columns: [{role: "sourceSegment", title: "Source", share: .5, sides: true},
 			{role: "weight", title: "Weight", share: .25}] })";
 
+class Table : public testing::Test
+{
+protected:
+	void Show(int i_Rows)
+	{
+		m_pRows = std::make_unique<VRows>(i_Rows);
+		m_Page.SetContext("rows", m_pRows.get());
+		ASSERT_TRUE(m_Page.Show(c_Table));
+	}
+
+	std::unique_ptr<VRows> m_pRows;
+	VQmlPage m_Page;
+	TesselPluginInterface::ISelection& m_rSelection = m_Page.Selection().Selection();
+};
+
 } // namespace
 
 TEST(Selection, OperationsOfTheSingleton)
@@ -126,48 +141,31 @@ TEST(Selection, EnginesHaveTheirOwn)
 	EXPECT_TRUE(second.View().rootObject()->property("selected").toBool());
 }
 
-TEST(Table, HoverAndPress)
+TEST_F(Table, HoverAndPress)
 {
-	VRows rows(4);
-	VQmlPage page;
-	page.SetContext("rows", &rows);
-	ASSERT_TRUE(page.Show(c_Table));
-	auto& rSelection = page.Selection().Selection();
-	auto& rPreSelection = page.Selection().PreSelection();
-	rSelection.Replace({Source(4)});
+	Show(4);
+	auto& rPreSelection = m_Page.Selection().PreSelection();
+	m_rSelection.Replace({Source(4)});
 
-	page.Hover("tableRow1");
+	m_Page.Hover("tableRow1");
 	EXPECT_EVENTUALLY(rPreSelection.Items() == std::vector{Target(1)});
-	page.Hover("tableRow3");
+	m_Page.Hover("tableRow3");
 	EXPECT_EVENTUALLY(rPreSelection.Items() == std::vector{Target(3)});
-	page.Hover("field");
+	m_Page.Hover("field");
 	EXPECT_EVENTUALLY(rPreSelection.Items().empty());
 
-	page.Press("tableRow2");
-	EXPECT_EQ(rSelection.Items(), (std::vector{Source(4), Target(2)}));
-	EXPECT_TRUE(page.Property("tableRows", "activeFocus").toBool());
+	m_Page.Click("field");
+	ASSERT_EQ(m_Page.FocusName(), "field");
+	m_Page.Press("tableRow2");
+	EXPECT_EQ(m_rSelection.Items(), (std::vector{Source(4), Target(2)}));
+	EXPECT_TRUE(m_Page.Property("tableRows", "activeFocus").toBool());
+	EXPECT_EQ(m_Page.Property("field", "selectedWhenLeft"), 0) << "takes the focus before it selects";
 }
 
-TEST(Table, TakesTheFocusBeforeItSelects)
+TEST_F(Table, KeysMoveTheSelection)
 {
-	VRows rows(4);
-	VQmlPage page;
-	page.SetContext("rows", &rows);
-	ASSERT_TRUE(page.Show(c_Table));
-	page.Click("field");
-	ASSERT_EQ(page.FocusName(), "field");
-	page.Press("tableRow2");
-	EXPECT_EQ(page.Property("field", "selectedWhenLeft"), 0);
-	EXPECT_EQ(page.Selection().Selection().Items(), std::vector{Target(2)});
-}
-
-TEST(Table, KeysMoveTheSelection)
-{
-	VRows rows(40);
-	VQmlPage page;
-	page.SetContext("rows", &rows);
-	ASSERT_TRUE(page.Show(c_Table));
-	page.Click("tableRow1");
+	Show(40);
+	m_Page.Click("tableRow1");
 	const struct
 	{
 		int m_Key;
@@ -176,41 +174,32 @@ TEST(Table, KeysMoveTheSelection)
 	    {Qt::Key_Down, 39}, {Qt::Key_Up, 38}};
 	for (const auto& rStep : steps)
 	{
-		page.Key(rStep.m_Key);
-		EXPECT_EQ(page.Selection().Selection().Items(), std::vector{Target(rStep.m_Selected)}) << rStep.m_Key;
+		m_Page.Key(rStep.m_Key);
+		EXPECT_EQ(m_rSelection.Items(), std::vector{Target(rStep.m_Selected)}) << rStep.m_Key;
 	}
-	EXPECT_TRUE(page.Has("tableRow39"));
+	EXPECT_TRUE(m_Page.Has("tableRow39"));
+
+	// What is selected elsewhere is gone to.
+	m_Page.Item("table")->setProperty("selectedIndex", 10);
+	EXPECT_TRUE(m_Page.Has("tableRow10"));
+	m_Page.Key(Qt::Key_Down);
+	EXPECT_EQ(m_rSelection.Items(), std::vector{Target(11)});
 }
 
-TEST(Table, GoesToWhatIsSelectedElsewhere)
+TEST_F(Table, KeepsItsScrollPositionOverAReset)
 {
-	VRows rows(40);
-	VQmlPage page;
-	page.SetContext("rows", &rows);
-	ASSERT_TRUE(page.Show(c_Table));
-	page.Click("tableRow1");
-	page.Item("table")->setProperty("selectedIndex", 30);
-	EXPECT_TRUE(page.Has("tableRow30"));
-	page.Key(Qt::Key_Down);
-	EXPECT_EQ(page.Selection().Selection().Items(), std::vector{Target(31)});
-}
-
-TEST(Table, KeepsItsScrollPositionOverAReset)
-{
-	VRows rows(100);
-	VQmlPage page;
-	page.SetContext("rows", &rows);
-	ASSERT_TRUE(page.Show(c_Table));
-	QQuickItem* const pRows = page.Item("tableRows");
-	pRows->setProperty("contentY", 50 * 22 + 7);
-	rows.Reset();
-	EXPECT_EQ(pRows->property("contentY").toInt() - pRows->property("originY").toInt(), 50 * 22 + 7);
+	Show(100);
+	const QQuickItem* const pRows = m_Page.Item("tableRows");
+	const auto scrolled = [pRows] { return pRows->property("contentY").toInt() - pRows->property("originY").toInt(); };
+	m_Page.Item("tableRows")->setProperty("contentY", 50 * 22 + 7);
+	m_pRows->Reset();
+	EXPECT_EQ(scrolled(), 50 * 22 + 7);
 	QCoreApplication::processEvents();
-	EXPECT_EQ(pRows->property("contentY").toInt() - pRows->property("originY").toInt(), 50 * 22 + 7);
-	EXPECT_TRUE(page.Has("tableRow51"));
+	EXPECT_EQ(scrolled(), 50 * 22 + 7);
+	EXPECT_TRUE(m_Page.Has("tableRow51"));
 
 	// Where fewer rows are left, it ends at the last one.
-	rows.removeRows(10, 90);
-	rows.Reset();
-	EXPECT_EVENTUALLY(pRows->property("contentY").toInt() - pRows->property("originY").toInt() == (10 - 5) * 22);
+	m_pRows->removeRows(10, 90);
+	m_pRows->Reset();
+	EXPECT_EVENTUALLY(scrolled() == (10 - 5) * 22);
 }

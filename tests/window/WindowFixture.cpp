@@ -1,12 +1,12 @@
 #include "WindowFixture.h"
 
+#include "../QtApplication.h"
 #include "studio/DarkStyle.h"
 #include "studio/Preferences.h"
 #include "studio/RetargetPanel.h"
 #include "studio/Services.h"
 
 #include <QAbstractItemModel>
-#include <QApplication>
 #include <QFile>
 #include <QProcess>
 #include <QQuickWidget>
@@ -15,26 +15,8 @@
 namespace
 {
 
-/// The one application of the process, as the program has it.
-class VApplication : public testing::Environment
-{
-public:
-	void SetUp() override
-	{
-		QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts);
-		m_pApplication = std::make_unique<QApplication>(m_Count, m_pArguments);
-		StudioHost::ApplyDarkStyle(*m_pApplication);
-	}
-	void TearDown() override { m_pApplication.reset(); }
-
-private:
-	int m_Count = 1;
-	char m_Name[5] = "test";
-	char* m_pArguments[2] = {m_Name, nullptr};
-	std::unique_ptr<QApplication> m_pApplication;
-};
-
-[[maybe_unused]] auto* const s_pEnvironment = testing::AddGlobalTestEnvironment(new VApplication);
+[[maybe_unused]] auto* const s_pEnvironment = testing::AddGlobalTestEnvironment(
+    new VQtApplication([] { QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts); }, StudioHost::ApplyDarkStyle));
 
 } // namespace
 
