@@ -50,9 +50,9 @@ TEST(NearestRevolution, Rows)
 		EXPECT_LT(Difference(Rotation::RotationMatrixFromAngleAxis(nearest), Pose(rRow.m_State, {}).linear()), 1e-14)
 		    << rRow.m_pName;
 	}
-	EXPECT_TRUE(assertions.Failed().empty());
+	EXPECT_TRUE(assertions.Take().empty());
 	NearestRevolution({std::nan(""), 0, 0}, {});
-	EXPECT_EQ(assertions.Failed(), std::vector<std::string>{"InputRAA.is_zero()"});
+	EXPECT_EQ(assertions.Take(), std::vector<std::string>{"InputRAA.is_zero()"});
 }
 
 VSubject::VSegment Ball()

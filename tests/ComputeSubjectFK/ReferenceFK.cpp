@@ -1,7 +1,6 @@
 #include "ReferenceFK.h"
 
 #include "CoreOrlexTypes/JointType.h"
-#include "DebugServices/Assert.h"
 
 namespace Reference
 {
@@ -11,9 +10,6 @@ namespace
 using Eigen::AngleAxisd;
 using Eigen::Isometry3d;
 using Eigen::Vector3d;
-
-std::vector<std::string> g_Failed;
-DebugServices::VAssertFailHandler g_pEarlier = nullptr;
 
 Isometry3d Motion(EJointType i_Type, const double* i_pState)
 {
@@ -132,23 +128,6 @@ double Difference(const Rotation::VMatrix3& i_rMatrix, const Eigen::Matrix3d& i_
 double Difference(const Rotation::VVector3& i_rPoint, const Vector3d& i_rExpected)
 {
 	return (Vector3d(i_rPoint.data()) - i_rExpected).cwiseAbs().maxCoeff();
-}
-
-VAssertions::VAssertions()
-{
-	g_Failed.clear();
-	g_pEarlier = DebugServices::SetAssertFailHandler(
-	    [](const char* i_pExpression, const char*, int) { g_Failed.emplace_back(i_pExpression); });
-}
-
-VAssertions::~VAssertions()
-{
-	DebugServices::SetAssertFailHandler(g_pEarlier);
-}
-
-const std::vector<std::string>& VAssertions::Failed() const
-{
-	return g_Failed;
 }
 
 } // namespace Reference

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "../Assertions.h"
+
 #include "CoreOrlexTypes/Subject.h"
 #include "numerics/Rotation.h"
 
@@ -7,7 +9,6 @@
 
 #include <numbers>
 #include <random>
-#include <string>
 #include <vector>
 
 /// Subjects for the tests, and the same kinematics written down naively with 4x4 matrices, one segment at a time by
@@ -43,14 +44,5 @@ Eigen::Isometry3d WorldPose(const VSubject& i_rSubject, const std::vector<double
 double Difference(const Rotation::VPose<double>& i_rPose, const Eigen::Isometry3d& i_rExpected);
 double Difference(const Rotation::VMatrix3& i_rMatrix, const Eigen::Matrix3d& i_rExpected);
 double Difference(const Rotation::VVector3& i_rPoint, const Eigen::Vector3d& i_rExpected);
-
-/// Collects the expressions of failed assertions while it lives.
-class VAssertions
-{
-public:
-	VAssertions();
-	~VAssertions();
-	const std::vector<std::string>& Failed() const;
-};
 
 } // namespace Reference

@@ -1,3 +1,4 @@
+#include "../CoreOrlexTypes/Damage.h"
 #include "ReferenceFK.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
@@ -58,7 +59,7 @@ TEST(SubjectFK, BadJointTypeIsAssertedAndRefused)
 		subject.m_Segments = {
 		    Segment(c_NoParent, VJointTypes::EBall), Segment(0, static_cast<Reference::EJointType>(type))};
 		EXPECT_THROW(VComputeSubjectFK{subject}, VConstructionException) << type;
-		EXPECT_EQ(assertions.Failed(), std::vector<std::string>{"m_pJoint"}) << type;
+		EXPECT_EQ(assertions.Take(), std::vector<std::string>{"m_pJoint"}) << type;
 	}
 }
 
@@ -129,7 +130,7 @@ TEST(SubjectFK, CopyIsDeep)
 
 	const VAssertions assertions;
 	VComputeSubjectFK copy(*pOriginal);
-	EXPECT_TRUE(assertions.Failed().empty());
+	EXPECT_TRUE(assertions.Take().empty());
 	EXPECT_EQ(VResults(copy), atFirst);
 	for (std::size_t i = 0; i < copy.NumberOfSegments(); ++i)
 	{
@@ -159,10 +160,10 @@ TEST(SubjectFK, CloneToAParentOfAnotherDepthIsAsserted)
 	const VComputeSubjectFK fk(subject);
 	const VAssertions assertions;
 	EXPECT_EQ(fk.Segment(1).Clone(&fk.Segment(0))->Parent(), &fk.Segment(0));
-	EXPECT_TRUE(assertions.Failed().empty());
+	EXPECT_TRUE(assertions.Take().empty());
 	fk.Segment(0).Clone(&fk.Segment(1));
 	fk.Segment(1).Clone(nullptr);
-	EXPECT_EQ(assertions.Failed(),
+	EXPECT_EQ(assertions.Take(),
 	    (std::vector<std::string>{"pCloneFK->m_Depth == i_pParent->TreeDepth() + 1", "pCloneFK->m_Depth == 1"}));
 }
 
@@ -170,31 +171,15 @@ TEST(SubjectFK, CloneToAParentOfAnotherDepthIsAsserted)
 TEST(SubjectFK, BrokenSubjectsAreRefusedOrUsable)
 {
 	std::mt19937 random(13);
-	const auto below = [&](std::uint32_t i_Limit)
-	{ return std::uniform_int_distribution<std::uint32_t>(0, i_Limit - 1)(random); };
+	VDamage damage(14);
 	const VAssertions assertions;
 	int refused = 0;
 	int usable = 0;
 	for (int i = 0; i < 5000; ++i)
 	{
 		VSubject subject = WithTargets(random);
-		for (std::uint32_t damage = 1 + below(3); damage > 0; --damage)
-		{
-			VSubject::VSegment& rSegment = subject.m_Segments[below(20)];
-			VTarget& rTarget = subject.m_Targets[below(5)];
-			switch (below(9))
-			{
-			case 0: rSegment.m_ParentSegmentIndex = below(25); break;
-			case 1: rSegment.m_Joint.m_JointType = static_cast<Reference::EJointType>(below(9)); break;
-			case 2: rSegment.m_PreRotation[below(3)] = std::nan(""); break;
-			case 3: rTarget.m_Type = static_cast<VTarget::ETargetType>(below(12)); break;
-			case 4: rTarget.m_State.resize(below(14), 1e300); break;
-			case 5: rTarget.m_MarkerIndices.assign(below(4), below(2) ? 0xFFFFFFFF : 1); break;
-			case 6: rTarget.m_RotationObservationIndices.assign(below(3), below(2) ? 0xFFFFFFFF : 0); break;
-			case 7: rTarget.m_SegmentIndices.assign(below(3), below(25)); break;
-			default: rTarget.m_Weight = below(2) ? -1.0 : std::nan(""); break;
-			}
-		}
+		damage.Change(subject.m_Targets, damage.Below(4));
+		damage.Change(subject.m_Segments, damage.Below(20));
 		try
 		{
 			VComputeSubjectFK fk(subject);

@@ -13,6 +13,7 @@ namespace
 using namespace ComputeSubject;
 using namespace Reference;
 using VTarget = VSubject::VTarget;
+using VNumbers = std::vector<double>;
 using Eigen::Vector3d;
 
 /// Two segments with everything set, so that a pose left out shows.
@@ -219,7 +220,7 @@ TEST(TargetFK, ComputeMarkers)
 		std::vector<Rotation::VVector3> positions(5, {7, 7, 7});
 		EXPECT_EQ(fk.ComputeMarkers(positions), rRow.m_bAllHaveWeight);
 		EXPECT_EQ(positions, rRow.m_Positions);
-		EXPECT_EQ(assertions.Failed(), rRow.m_Assertions);
+		EXPECT_EQ(assertions.Take(), rRow.m_Assertions);
 	}
 }
 
@@ -234,7 +235,7 @@ TEST(TargetFK, GroupIndexBeyondTheListIsLeftOut)
 	std::vector<Rotation::VVector3> positions;
 	EXPECT_FALSE(fk.ComputeMarkers(positions));
 	EXPECT_EQ(positions, (std::vector<Rotation::VVector3>{{1, 2, 3}, {0, 0, 0}}));
-	EXPECT_EQ(assertions.Failed(), (std::vector<std::string>(2, "rIdx < io_rPositions.size()")));
+	EXPECT_EQ(assertions.Take(), (std::vector<std::string>(2, "rIdx < io_rPositions.size()")));
 }
 
 TEST(TargetFK, ComputeRotationsTakesTheLast)
@@ -251,77 +252,51 @@ TEST(TargetFK, ComputeRotationsTakesTheLast)
 	EXPECT_EQ(rotations[1], Rotation::c_Identity3);
 }
 
-struct VRefusedRow
-{
-	const char* m_pName;
-	void (*m_pChange)(VTarget& io_rTarget);
-	VTarget m_Target;
-};
-
 const VTarget c_GoodPoint = Target(c_Point, 0, {1, 2, 3}, 0);
 const VTarget c_GoodPlane = Target(VTarget::ELocalPlaneToWorldPoint, 0, {1, 2, 3, 0, 0, 1}, 0);
 const VTarget c_GoodLine = Target(VTarget::ELocalLineToWorldPoint, 0, {1, 2, 3, 0, 0, 1}, 0);
 const VTarget c_GoodRotation = Target(VTarget::ELocalRotationToWorldRotation, 0, {1, 2, 3}, 0);
 const VTarget c_GoodBody = []
 {
-	VTarget body = Target(VTarget::ERigidBody, 0, std::vector<double>(12, 1.0), 0);
+	VTarget body = Target(VTarget::ERigidBody, 0, VNumbers(12, 1.0), 0);
 	body.m_MarkerIndices = {0, 1};
 	return body;
 }();
 
-const VRefusedRow c_Refused[] = {
-    {"PointStateShort", [](VTarget& t) { t.m_State.pop_back(); }, c_GoodPoint},
-    {"PointStateLong", [](VTarget& t) { t.m_State.push_back(0); }, c_GoodPoint},
-    {"PointNoSegment", [](VTarget& t) { t.m_SegmentIndices.clear(); }, c_GoodPoint},
-    {"PointTwoSegments",
-        [](VTarget& t) {
-	        t.m_SegmentIndices = {0, 0};
-        },
-        c_GoodPoint},
-    {"PointSegmentOutOfRange", [](VTarget& t) { t.m_SegmentIndices = {1}; }, c_GoodPoint},
-    {"PointNoMarker", [](VTarget& t) { t.m_MarkerIndices.clear(); }, c_GoodPoint},
-    {"PointTwoMarkers",
-        [](VTarget& t) {
-	        t.m_MarkerIndices = {0, 1};
-        },
-        c_GoodPoint},
-    {"PlaneStateShort", [](VTarget& t) { t.m_State.pop_back(); }, c_GoodPlane},
-    {"PlaneStateLong", [](VTarget& t) { t.m_State.push_back(0); }, c_GoodPlane},
-    {"LineStateShort", [](VTarget& t) { t.m_State.resize(3); }, c_GoodLine},
-    {"BodyOfOneMarker",
-        [](VTarget& t)
-        {
-	        t.m_MarkerIndices = {0};
-	        t.m_State.resize(9);
-        },
-        c_GoodBody},
-    {"BodyStateShort", [](VTarget& t) { t.m_State.pop_back(); }, c_GoodBody},
-    {"RotationWithMarker", [](VTarget& t) { t.m_MarkerIndices = {0}; }, c_GoodRotation},
-    {"RotationWithTwoObservations",
-        [](VTarget& t) {
-	        t.m_RotationObservationIndices = {0, 1};
-        },
-        c_GoodRotation},
-    {"RotationWithoutObservation", [](VTarget& t) { t.m_RotationObservationIndices.clear(); }, c_GoodRotation},
-    {"RotationOrientationOfTwo",
-        [](VTarget& t) {
-	        t.m_RotationTargetOrientation = {0, 1};
-        },
-        c_GoodRotation},
-    {"RotationStateShort", [](VTarget& t) { t.m_State.pop_back(); }, c_GoodRotation},
+template <typename T>
+VTarget With(VTarget i_Target, std::vector<T> VTarget::*i_pList, std::vector<std::type_identity_t<T>> i_Values)
+{
+	i_Target.*i_pList = std::move(i_Values);
+	return i_Target;
+}
+
+const std::pair<const char*, VTarget> c_Refused[] = {
+    {"PointStateShort", With(c_GoodPoint, &VTarget::m_State, {1, 2})},
+    {"PointStateLong", With(c_GoodPoint, &VTarget::m_State, {1, 2, 3, 4})},
+    {"PointNoSegment", With(c_GoodPoint, &VTarget::m_SegmentIndices, {})},
+    {"PointTwoSegments", With(c_GoodPoint, &VTarget::m_SegmentIndices, {0, 0})},
+    {"PointSegmentOutOfRange", With(c_GoodPoint, &VTarget::m_SegmentIndices, {1})},
+    {"PointNoMarker", With(c_GoodPoint, &VTarget::m_MarkerIndices, {})},
+    {"PointTwoMarkers", With(c_GoodPoint, &VTarget::m_MarkerIndices, {0, 1})},
+    {"PlaneStateShort", With(c_GoodPlane, &VTarget::m_State, {1, 2, 3, 0, 0})},
+    {"PlaneStateLong", With(c_GoodPlane, &VTarget::m_State, {1, 2, 3, 0, 0, 1, 0})},
+    {"LineStateShort", With(c_GoodLine, &VTarget::m_State, {1, 2, 3})},
+    {"BodyOfOneMarker", With(With(c_GoodBody, &VTarget::m_MarkerIndices, {0}), &VTarget::m_State, VNumbers(9))},
+    {"BodyStateShort", With(c_GoodBody, &VTarget::m_State, VNumbers(11))},
+    {"RotationWithMarker", With(c_GoodRotation, &VTarget::m_MarkerIndices, {0})},
+    {"RotationWithTwoObservations", With(c_GoodRotation, &VTarget::m_RotationObservationIndices, {0, 1})},
+    {"RotationWithoutObservation", With(c_GoodRotation, &VTarget::m_RotationObservationIndices, {})},
+    {"RotationOrientationOfTwo", With(c_GoodRotation, &VTarget::m_RotationTargetOrientation, {0, 1})},
+    {"RotationStateShort", With(c_GoodRotation, &VTarget::m_State, {1, 2})},
 };
 
 TEST(TargetFK, UnfitTargetsAreRefused)
 {
 	const VAssertions assertions;
 	EXPECT_NO_THROW(VComputeSubjectFK(Still({c_GoodPoint, c_GoodPlane, c_GoodLine, c_GoodRotation, c_GoodBody})));
-	for (const VRefusedRow& rRow : c_Refused)
-	{
-		VTarget target = rRow.m_Target;
-		rRow.m_pChange(target);
-		EXPECT_THROW(VComputeSubjectFK(Still({target})), VConstructionException) << rRow.m_pName;
-	}
-	EXPECT_EQ(assertions.Failed(), (std::vector<std::string>{"StateIter == i_rTarget.m_State.end()"}));
+	for (const auto& [pName, target] : c_Refused)
+		EXPECT_THROW(VComputeSubjectFK(Still({target})), VConstructionException) << pName;
+	EXPECT_EQ(assertions.Take(), (std::vector<std::string>{"StateIter == i_rTarget.m_State.end()"}));
 }
 
 TEST(TargetFK, TypesWithoutAClassStayNullAndAreSkipped)
@@ -332,7 +307,7 @@ TEST(TargetFK, TypesWithoutAClassStayNullAndAreSkipped)
 		SCOPED_TRACE(type);
 		const VAssertions assertions;
 		VComputeSubjectFK fk(Still({Target(type, 0, {}, 3), c_GoodPoint, c_GoodRotation}));
-		EXPECT_EQ(assertions.Failed(), std::vector<std::string>{"m_Targets.back()"});
+		EXPECT_EQ(assertions.Take(), std::vector<std::string>{"m_Targets.back()"});
 		ASSERT_EQ(fk.NumberOfTargets(), 3u);
 		EXPECT_EQ(fk.Target(0), nullptr);
 		EXPECT_EQ(fk.NumberOfMarkers(), 1u);

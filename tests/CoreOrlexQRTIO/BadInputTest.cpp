@@ -1,7 +1,5 @@
 #include "Content.h"
 
-#include <boost/filesystem.hpp>
-
 #include <algorithm>
 #include <clocale>
 #include <random>
@@ -46,7 +44,7 @@ TEST(BadInput, TruncatedAtEveryByte)
 {
 	for (const char* const pName : {"version-1.0.qrs", "version-3.5.qrs"})
 	{
-		std::string text = ReadBytes(DataPath(pName));
+		std::string text = DataText(pName);
 		const std::size_t whole = text.find_last_of('>') + 1;
 		for (std::size_t size = 0; size < whole; ++size)
 		{
@@ -59,7 +57,7 @@ TEST(BadInput, TruncatedAtEveryByte)
 
 TEST(BadInput, DamagedBytes)
 {
-	const std::string text = ReadBytes(DataPath("version-3.5.qrs"));
+	const std::string text = DataText("version-3.5.qrs");
 	std::mt19937 random(20240229);
 	const std::string bytes = "<>\"'/=&;-+.*0 9eE#x\n\t\xC3\xFF";
 	int read = 0;
@@ -115,25 +113,23 @@ TEST(BadInput, NestedTooDeep)
 
 TEST(BadInput, FilesThatAreNone)
 {
-	const boost::filesystem::path folder = boost::filesystem::temp_directory_path() / boost::filesystem::unique_path();
-	boost::filesystem::create_directory(folder);
-	for (const boost::filesystem::path& rPath : {folder, folder / "none.qrs"})
+	const VTestFolder folder;
+	for (const boost::filesystem::path& rPath : {folder.Path(), folder / "none.qrs"})
 	{
-		VContent content = ReadText(ReadBytes(DataPath("performer.qrs")));
+		VContent content = ReadText(DataText("performer.qrs"));
 		EXPECT_FALSE(VReader().Read(rPath, "Template", c_TestId, content.m_Subject, content.m_ApplicationData,
 		    content.m_Extras, content.m_Errors, content.m_Warnings));
 		EXPECT_EQ(content.m_Errors, VTexts({"Error opening file '" + rPath.string() + "' for reading"}));
 		EXPECT_TRUE(content.m_Subject.m_Segments.empty());
 	}
-	boost::filesystem::remove_all(folder);
 }
 
 TEST(Locale, DecimalCommasChangeNothing)
 {
-	const std::string before = WriteText(ReadText(ReadBytes(DataPath("version-3.5.qrs"))));
+	const std::string before = WriteText(ReadText(DataText("version-3.5.qrs")));
 	if (!std::setlocale(LC_ALL, "de_DE.UTF-8"))
 		GTEST_SKIP() << "the locale de_DE.UTF-8 is not installed";
-	const VContent content = ReadText(ReadBytes(DataPath("version-3.5.qrs")));
+	const VContent content = ReadText(DataText("version-3.5.qrs"));
 	const std::string after = WriteText(content);
 	std::setlocale(LC_ALL, "C");
 	EXPECT_EQ(content.m_Subject.m_DynamicParameters[0].m_Value, 1.5);

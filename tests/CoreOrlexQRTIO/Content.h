@@ -1,13 +1,13 @@
 #pragma once
 
+#include "../UtilsFileSystem/Folder.h"
+
 #include "CoreOrlexQRTIO/FormatVersions.h"
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexQRTIO/Writer.h"
 
 #include <gtest/gtest.h>
 
-#include <fstream>
-#include <iterator>
 #include <string>
 #include <vector>
 
@@ -27,16 +27,9 @@ struct VContent
 
 inline constexpr std::uint32_t c_TestId = 0x0FFFFFFF;
 
-inline std::string ReadBytes(const std::string& i_rPath)
+inline std::string DataText(const std::string& i_rName)
 {
-	std::ifstream file(i_rPath, std::ios::binary);
-	EXPECT_TRUE(file.is_open()) << i_rPath;
-	return {std::istreambuf_iterator<char>(file), {}};
-}
-
-inline std::string DataPath(const std::string& i_rName)
-{
-	return std::string(RETARGET_TEST_DATA "/qrt/") + i_rName;
+	return Get(RETARGET_TEST_DATA "/qrt/" + i_rName);
 }
 
 inline VContent ReadText(const std::string& i_rText, std::uint32_t i_Id = c_TestId)

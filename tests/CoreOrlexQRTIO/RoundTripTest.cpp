@@ -11,7 +11,7 @@ using VTexts = std::vector<std::string>;
 
 TEST(RoundTrip, PerformerReadsWithoutAWordAndComesBackEqual)
 {
-	const VContent performer = ReadText(ReadBytes(DataPath("performer.qrs")));
+	const VContent performer = ReadText(DataText("performer.qrs"));
 	ASSERT_TRUE(performer.m_bRead);
 	EXPECT_EQ(performer.m_Errors, VTexts());
 	EXPECT_EQ(performer.m_Warnings, VTexts());

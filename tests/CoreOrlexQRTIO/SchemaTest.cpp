@@ -1,7 +1,5 @@
 #include "Content.h"
 
-#include <boost/filesystem.hpp>
-
 #include <array>
 #include <cstdio>
 
@@ -14,12 +12,6 @@ namespace
 class Schema : public testing::Test
 {
 protected:
-	Schema() : m_Folder(boost::filesystem::temp_directory_path() / boost::filesystem::unique_path())
-	{
-		boost::filesystem::create_directory(m_Folder);
-	}
-	~Schema() override { boost::filesystem::remove_all(m_Folder); }
-
 	void SetUp() override
 	{
 		if (Run("xmllint --version") != 0)
@@ -30,7 +22,8 @@ protected:
 	int Run(const std::string& i_rCommand)
 	{
 		m_Output.clear();
-		std::FILE* const pPipe = popen(("cd '" + m_Folder.string() + "' && " + i_rCommand + " 2>&1").c_str(), "r");
+		std::FILE* const pPipe =
+		    popen(("cd '" + m_Folder.Path().string() + "' && " + i_rCommand + " 2>&1").c_str(), "r");
 		if (!pPipe)
 			return -1;
 		std::array<char, 4096> buffer;
@@ -42,7 +35,7 @@ protected:
 	/// Lines of complaint about a text.
 	std::vector<std::string> Validate(const std::string& i_rText)
 	{
-		std::ofstream((m_Folder / "file.xml").string(), std::ios::binary) << i_rText;
+		Put(m_Folder / "file.xml", i_rText);
 		const int status = Run("xmllint --noout --nonet --schema schema.xsd file.xml");
 		std::vector<std::string> lines;
 		std::istringstream stream(m_Output);
@@ -53,26 +46,26 @@ protected:
 		return lines;
 	}
 
-	boost::filesystem::path m_Folder;
+	const VTestFolder m_Folder;
 	std::string m_Output;
 };
 
 TEST_F(Schema, IsASchemaAndTakesWhatIsWritten)
 {
-	EXPECT_EQ(Validate(WriteText(ReadText(ReadBytes(DataPath("performer.qrs"))))), std::vector<std::string>());
-	EXPECT_EQ(Validate(WriteText(ReadText(ReadBytes(DataPath("version-1.0.qrs"))), 0)), std::vector<std::string>());
+	EXPECT_EQ(Validate(WriteText(ReadText(DataText("performer.qrs")))), std::vector<std::string>());
+	EXPECT_EQ(Validate(WriteText(ReadText(DataText("version-1.0.qrs")), 0)), std::vector<std::string>());
 }
 
 /// The short list of docs/skeleton-format.md: what is written although the schema takes it for an error.
 TEST_F(Schema, FlagsTheShortList)
 {
-	VContent content = ReadText(ReadBytes(DataPath("version-3.5.qrs")));
+	VContent content = ReadText(DataText("version-3.5.qrs"));
 	const std::vector<std::string> order = Validate(WriteText(content));
 	ASSERT_EQ(order.size(), 1u);
 	EXPECT_NE(order[0].find("Element 'TargetLocalPlaneToWorldPoint': This element is not expected."), std::string::npos)
 	    << order[0];
 
-	content = ReadText(ReadBytes(DataPath("performer.qrs")));
+	content = ReadText(DataText("performer.qrs"));
 	content.m_Subject.m_Markers[0].m_Name = "Hips";
 	std::vector<std::string> complaints = Validate(WriteText(content));
 	ASSERT_EQ(complaints.size(), 1u);
@@ -89,7 +82,7 @@ TEST_F(Schema, FlagsTheShortList)
 TEST_F(Schema, KeepsDocsTypesAndVersions)
 {
 	const std::string text = VReader().SchemaText();
-	EXPECT_TRUE(ReadBytes((m_Folder / "schema.xsd").string()) == text);
+	EXPECT_TRUE(Get(m_Folder / "schema.xsd") == text);
 	for (const char* const pPart :
 	    {"<?xml-stylesheet type=\"text/xsl\" href=\"Orlex_QRT_Schema-HTML.xsl\"?>",
 	        "<xsd:element name=\"KinematicModel\">", "The rotation to apply to the geometry tat represents the segment",

@@ -37,7 +37,7 @@ protected:
 	{
 		ASSERT_TRUE(UtilsRapidXml::ToValue(GetParam(), m_Version));
 		m_VersionValue = VersionValueFromText(GetParam()).value();
-		m_Content = ReadText(ReadBytes(DataPath("version-" + GetParam() + ".qrs")));
+		m_Content = ReadText(DataText("version-" + GetParam() + ".qrs"));
 		ASSERT_TRUE(m_Content.m_bRead) << boost::join(m_Content.m_Errors, "\n");
 	}
 
@@ -210,7 +210,7 @@ TEST_P(FrozenFile, ComesBackEqualAtItsOwnVersion)
 /// What a subject of 3.5 becomes at this version can be read again, and is stable from then on.
 TEST_P(FrozenFile, TakesASubjectOfTheLatestVersion)
 {
-	const std::string first = WriteText(ReadText(ReadBytes(DataPath("version-3.5.qrs"))), m_VersionValue);
+	const std::string first = WriteText(ReadText(DataText("version-3.5.qrs")), m_VersionValue);
 	const VContent again = ReadText(first);
 	EXPECT_TRUE(again.m_bRead) << boost::join(again.m_Errors, "\n");
 	EXPECT_EQ(again.m_Warnings, c_WrittenFileWarnings);
@@ -219,7 +219,7 @@ TEST_P(FrozenFile, TakesASubjectOfTheLatestVersion)
 
 TEST(Versions, LossesAreCounted)
 {
-	const VContent content = ReadText(ReadBytes(DataPath("version-3.5.qrs")));
+	const VContent content = ReadText(DataText("version-3.5.qrs"));
 	const auto losses = [&](const char* i_pVersion)
 	{
 		return ListVersionLosses(

@@ -1,6 +1,6 @@
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+#include "../Assertions.h"
 
-#include "DebugServices/Assert.h"
+#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
 
 #include <gtest/gtest.h>
 
@@ -33,16 +33,6 @@ protected:
 	VDynamicExpressionParserSimple m_Parser;
 	std::string m_Error;
 };
-
-TEST_F(StaticExpressionParser, AddsInOrder)
-{
-	ASSERT_TRUE(m_Parser.AddStaticParameter("Arm", 3.0, m_Error));
-	ASSERT_TRUE(m_Parser.AddStaticParameter("Area", "Arm^2*cos(0)", m_Error)) << m_Error;
-	ASSERT_TRUE(m_Parser.AddStaticParameter("Empty", "", m_Error));
-	EXPECT_EQ(Value("Area+1"), 10.0);
-	EXPECT_EQ(Value("Empty"), 0.0);
-	EXPECT_EQ(Value(""), 0.0);
-}
 
 TEST_F(StaticExpressionParser, TellsWhatItCannotAddOrSetAndChangesNothing)
 {
@@ -192,18 +182,15 @@ TEST_F(StaticExpressionParser, ContextsDifferInWhatTheyTake)
 
 TEST(SingleElementIVector, TakesOneNumber)
 {
-	static std::string s_Told;
-	const auto pBefore = DebugServices::SetAssertFailHandler(
-	    [](const char* i_pExpression, const char*, int) { s_Told = i_pExpression; });
+	const VAssertions assertions;
 	VStaticExpressionParser::VSingleElementIVector vector(1.0);
 	const double values[] = {2.0, 3.0};
 	vector.Assign(values, 1);
-	EXPECT_EQ(s_Told, "");
+	EXPECT_TRUE(assertions.Take().empty());
 	vector.Assign(values + 1, 0);
-	EXPECT_EQ(s_Told, "i_Count == 1");
+	EXPECT_EQ(assertions.Take(), std::vector<std::string>{"i_Count == 1"});
 	EXPECT_EQ(vector.Get(0), 2.0);
 	EXPECT_EQ(vector.Size(), 1u);
-	DebugServices::SetAssertFailHandler(pBefore);
 }
 
 } // namespace

@@ -1,8 +1,8 @@
+#include "../Assertions.h"
+
 #include "CoreOrlexTypesUtils/AxisOrientation.h"
 #include "CoreOrlexTypesUtils/PoseVector.h"
 #include "CoreOrlexTypesUtils/UnusedObservations.h"
-
-#include "DebugServices/Assert.h"
 
 #include <gtest/gtest.h>
 
@@ -90,15 +90,11 @@ TEST(AxisOrientation, ChoosesTheSecondDirection)
 
 TEST(AxisOrientation, RefusesAxesAndDirectionsThatDoNotFit)
 {
-	static std::vector<std::string> s_Told;
-	s_Told.clear();
-	const auto pBefore = DebugServices::SetAssertFailHandler(
-	    [](const char* i_pExpression, const char*, int) { s_Told.push_back(i_pExpression); });
+	const VAssertions assertions;
 	ExpectNear(TwoAxisOrientation({0, 1, 0}, {0, 0, 1}, 3, 0), {0, 0, 0});
 	ExpectNear(TwoAxisOrientation({0, 1, 0}, {0, 0, 1}, 0, 3), {0, 0, 0});
 	ExpectNear(TwoAxisOrientation({0, 1, 0}, {0, 0, 1}, 1, 1), {0, 0, 0});
-	DebugServices::SetAssertFailHandler(pBefore);
-	EXPECT_EQ(s_Told,
+	EXPECT_EQ(assertions.Take(),
 	    (std::vector<std::string>{
 	        "i_FirstDesiredAxis < 3", "i_SecondDesiredAxis < 3", "i_SecondDesiredAxis != i_FirstDesiredAxis"}));
 	ExpectNear(TwoAxisOrientation({0, 0, 0}, {0, 0, 1}, 2, 0), {0, 0, 0});

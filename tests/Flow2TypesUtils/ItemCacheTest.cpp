@@ -1,7 +1,7 @@
+#include "../Assertions.h"
+
 #include "CoreOrlexTypes/Subject.h"
-#include "DebugServices/Assert.h"
-#include "Flow2TypesUtils/FlowParametersItem.h"
-#include "Flow2TypesUtils/ParameterSet.h"
+#include "Flow2TypesUtils/ItemCache.h"
 #include "Flow2TypesUtils/TaggedCoreTypeExtractor.h"
 #include "InMemoryHost/PluginContext.h"
 
@@ -17,19 +17,7 @@ using NVX::CountedPointer;
 using TesselPluginInterface::IFlowFrame;
 using TesselPluginInterface::IFlowItem;
 
-/// The expressions of the assertions that fail while this lives.
-class VAssertRecorder
-{
-public:
-	VAssertRecorder() : m_pBefore(DebugServices::SetAssertFailHandler(Note)) { s_Failed.clear(); }
-	~VAssertRecorder() { DebugServices::SetAssertFailHandler(m_pBefore); }
-	static std::string Take() { return std::exchange(s_Failed, {}); }
-
-private:
-	static void Note(const char* i_pExpression, const char*, int) { s_Failed += i_pExpression; }
-	static inline std::string s_Failed;
-	const DebugServices::VAssertFailHandler m_pBefore;
-};
+using VTexts = std::vector<std::string>;
 
 class ItemCache : public testing::Test
 {
@@ -97,24 +85,9 @@ TEST_F(ItemCache, AnItemWithoutAValueHasNone)
 	EXPECT_FALSE(cache.GetValue()) << "the host's item carries something else";
 }
 
-TEST_F(ItemCache, HoldsParametersToo)
-{
-	auto pParameters = std::make_shared<Flow2Utils::VParameterSet>();
-	auto pParameter = std::make_unique<Flow2Utils::VParameterTyped<std::uint32_t>>("PoseIndex");
-	pParameter->Set(3);
-	pParameters->Add(std::move(pParameter));
-	auto pValue = std::make_shared<FlowParametersItem>();
-	pValue->m_pParameters = pParameters;
-	VItemCacheTyped<FlowParametersItem> cache(FlowParametersItem::c_pName);
-	EXPECT_TRUE(cache.Update(*Frame({Item<FlowParametersItem>("FlowParametersItem", pValue)})));
-	EXPECT_EQ(cache.Value()->m_pParameters->Value<std::uint32_t>("PoseIndex", 0), 3u);
-	EXPECT_STREQ(
-	    FlowParametersItem::c_pDocumentation, "Parameters that can be tagged and addressed to a particular target");
-}
-
 TEST_F(ItemCache, TheExtractorAsksByTag)
 {
-	VAssertRecorder asserts;
+	const VAssertions assertions;
 	VTaggedCoreTypeExtractor extractor;
 	EXPECT_FALSE(extractor.Insert(4100)) << "no such type";
 	EXPECT_TRUE(extractor.Insert(4114) && extractor.Insert(4122));
@@ -129,25 +102,25 @@ TEST_F(ItemCache, TheExtractorAsksByTag)
 	EXPECT_TRUE(extractor.Insert(4114));
 	EXPECT_EQ(extractor.Get(4114), pSubject) << "inserting again keeps the item";
 	EXPECT_EQ(extractor.Cache(4114)->Generation(), 1u);
-	EXPECT_EQ(asserts.Take(), "");
+	EXPECT_EQ(assertions.Take(), VTexts());
 
 	extractor.Reset();
 	EXPECT_EQ(extractor.Get(4114), nullptr);
 	EXPECT_TRUE(extractor.Update(*pFrame));
-	EXPECT_EQ(asserts.Take(), "");
+	EXPECT_EQ(assertions.Take(), VTexts());
 }
 
 TEST_F(ItemCache, ATagThatWasNeverInsertedFailsTheAssertion)
 {
-	VAssertRecorder asserts;
+	const VAssertions assertions;
 	VTaggedCoreTypeExtractor extractor;
 	extractor.Insert(4114);
 	EXPECT_EQ(extractor.Get(4123), nullptr);
-	EXPECT_EQ(asserts.Take(), "It != m_ItemCacheMap.end()");
+	EXPECT_EQ(assertions.Take(), VTexts{"It != m_ItemCacheMap.end()"});
 	EXPECT_EQ(extractor.Get<VSubject>(4123), nullptr);
-	EXPECT_EQ(asserts.Take(), "It != m_ItemCacheMap.end()");
+	EXPECT_EQ(assertions.Take(), VTexts{"It != m_ItemCacheMap.end()"});
 	EXPECT_EQ(extractor.Get<VSubjectParametrised>(4114), nullptr);
-	EXPECT_EQ(asserts.Take(), "pTyped != nullptr");
+	EXPECT_EQ(assertions.Take(), VTexts{"pTyped != nullptr"});
 }
 
 } // namespace

@@ -1,10 +1,10 @@
+#include "Assertions.h"
 #include "UtilsFileSystem/Log.h"
 
 #include "TesselDataStore/DataStore.h"
 #include "TesselDataStore/DataWriter.h"
 #include "TesselDataStore/TypedGet.h"
 
-#include "DebugServices/Assert.h"
 #include "InMemoryHost/Dispatcher.h"
 
 #include <gtest/gtest.h>
@@ -18,20 +18,10 @@ namespace
 using namespace TesselDataStore;
 using VTexts = std::vector<std::string>;
 
-VTexts s_FailedAssertions;
-
 class DataStore : public testing::Test
 {
 protected:
-	DataStore()
-	{
-		s_FailedAssertions.clear();
-		m_pBefore = DebugServices::SetAssertFailHandler(
-		    [](const char* i_pExpression, const char*, int) { s_FailedAssertions.push_back(i_pExpression); });
-	}
-	~DataStore() override { DebugServices::SetAssertFailHandler(m_pBefore); }
-
-	DebugServices::VAssertFailHandler m_pBefore;
+	const VAssertions m_Assertions;
 	VTestLog m_Log{"Store"};
 	const std::shared_ptr<VDataStore> m_pStore = std::make_shared<VDataStore>();
 	const std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
@@ -53,25 +43,22 @@ TEST_F(DataStore, KeepsTypedValues)
 	EXPECT_TRUE(writer.Set("ulong", ToVariant<std::uint64_t>(5)));
 	EXPECT_TRUE(writer.Set("float", ToVariant(0.25f)));
 	EXPECT_TRUE(writer.Set("empty", {}));
-
-	bool bFlag = false;
-	std::int32_t number = 0;
-	std::uint32_t count = 0;
-	std::int64_t longNumber = 0;
-	std::uint64_t longCount = 0;
-	float single = 0;
-	double real = 0;
-	std::string text;
-	boost::filesystem::path path;
-	EXPECT_TRUE(writer.GetBool("bool", bFlag) && bFlag);
-	EXPECT_TRUE(writer.GetInt32("int", number) && number == -3);
-	EXPECT_TRUE(writer.GetUInt32("uint", count) && count == 3);
-	EXPECT_TRUE(writer.GetInt64("long", longNumber) && longNumber == -5);
-	EXPECT_TRUE(writer.GetUInt64("ulong", longCount) && longCount == 5);
-	EXPECT_TRUE(writer.GetFloat32("float", single) && single == 0.25f);
-	EXPECT_TRUE(writer.GetFloat64("real", real) && real == 0.5);
-	EXPECT_TRUE(writer.GetString("text", text) && text == "a");
-	EXPECT_TRUE(writer.GetPath("path", path) && path == "/b");
+	const auto expect = [&]<typename T>(
+	                        bool (VDataReader::*i_pGet)(const std::string&, T&) const, const char* i_pKey, T i_Expected)
+	{
+		T value{};
+		EXPECT_TRUE((writer.*i_pGet)(i_pKey, value));
+		EXPECT_EQ(value, i_Expected);
+	};
+	expect(&VDataReader::GetBool, "bool", true);
+	expect(&VDataReader::GetInt32, "int", -3);
+	expect(&VDataReader::GetUInt32, "uint", 3u);
+	expect(&VDataReader::GetInt64, "long", std::int64_t(-5));
+	expect(&VDataReader::GetUInt64, "ulong", std::uint64_t(5));
+	expect(&VDataReader::GetFloat32, "float", 0.25f);
+	expect(&VDataReader::GetFloat64, "real", 0.5);
+	expect(&VDataReader::GetString, "text", std::string("a"));
+	expect(&VDataReader::GetPath, "path", boost::filesystem::path("/b"));
 
 	EXPECT_TRUE(writer.HasEntry("empty"));
 	EXPECT_FALSE(writer.HasValue("empty"));
@@ -81,7 +68,7 @@ TEST_F(DataStore, KeepsTypedValues)
 	EXPECT_EQ(writer.GetKeys("u"), (VTexts{"uint", "ulong"}));
 	EXPECT_TRUE(writer.Remove("uint"));
 	EXPECT_FALSE(writer.Remove("uint"));
-	EXPECT_FALSE(writer.GetUInt32("uint", count));
+	EXPECT_FALSE(writer.HasEntry("uint"));
 	EXPECT_EQ(m_Log.Take(), VTexts());
 }
 
@@ -138,15 +125,15 @@ TEST_F(DataStore, AnOperationWithoutAStoreFailsItsAssertion)
 {
 	VDataWriter writer(nullptr);
 	const VTexts once{"m_pDataStore != nullptr"};
-	EXPECT_EQ(std::exchange(s_FailedAssertions, {}), once);
+	EXPECT_EQ(m_Assertions.Take(), once);
 	std::string text;
 	EXPECT_FALSE(writer.SetString("key", "a"));
-	EXPECT_EQ(std::exchange(s_FailedAssertions, {}), once);
+	EXPECT_EQ(m_Assertions.Take(), once);
 	EXPECT_FALSE(writer.GetString("key", text));
 	EXPECT_FALSE(writer.Remove("key"));
 	EXPECT_FALSE(writer.HasEntry("key"));
 	EXPECT_EQ(writer.GetKeys("").size(), 0u);
-	EXPECT_EQ(s_FailedAssertions.size(), 4u);
+	EXPECT_EQ(m_Assertions.Take().size(), 4u);
 }
 
 TEST_F(DataStore, AWriterInsideAReaderStaysWithoutAStore)
@@ -155,19 +142,17 @@ TEST_F(DataStore, AWriterInsideAReaderStaysWithoutAStore)
 	{
 		const VDataReader reader(m_pStore);
 		VDataWriter writer(m_pStore);
-		EXPECT_EQ(std::exchange(s_FailedAssertions, {}),
-		    VTexts{"Fatal attempt to acquire a write lock from within a read lock."});
+		EXPECT_EQ(m_Assertions.Take(), VTexts{"Fatal attempt to acquire a write lock from within a read lock."});
 		EXPECT_FALSE(writer.SetInt32("key", 2));
-		EXPECT_EQ(s_FailedAssertions, VTexts{"m_pDataStore != nullptr"});
+		EXPECT_EQ(m_Assertions.Take(), VTexts{"m_pDataStore != nullptr"});
 		std::int32_t value = 0;
 		EXPECT_TRUE(reader.GetInt32("key", value));
 		EXPECT_EQ(value, 1);
 		// Another store is another matter.
-		s_FailedAssertions.clear();
 		EXPECT_TRUE(VDataWriter(std::make_shared<VDataStore>()).SetInt32("key", 2));
 	}
 	EXPECT_TRUE(VDataWriter(m_pStore).SetInt32("key", 2));
-	EXPECT_EQ(s_FailedAssertions, VTexts());
+	EXPECT_EQ(m_Assertions.Take(), VTexts());
 }
 
 TEST_F(DataStore, AThreadMayOpenAgainWhatItHolds)
@@ -201,7 +186,7 @@ TEST_F(DataStore, AThreadMayOpenAgainWhatItHolds)
 	other.join();
 	EXPECT_TRUE(VDataReader(m_pStore).GetInt32("key", value));
 	EXPECT_EQ(value, 2);
-	EXPECT_EQ(s_FailedAssertions, VTexts());
+	EXPECT_EQ(m_Assertions.Take(), VTexts());
 }
 
 TEST_F(DataStore, ReadersAreInTogether)
@@ -312,12 +297,12 @@ TEST_F(DataStore, TellsOfChangesOnlyQueuedAndAfterTheWriter)
 	EXPECT_EQ(run(), VTexts{"Group/>Group/b"});
 	VDataWriter(m_pStore).Remove("Group/a");
 	EXPECT_EQ(run(), (VTexts{"Group/>Group/a", "Group/a>Group/a"}));
-	EXPECT_EQ(s_FailedAssertions, VTexts());
+	EXPECT_EQ(m_Assertions.Take(), VTexts());
 	EXPECT_FALSE(m_pStore
 	                 ->Subscribe(
 	                     "key", [](const std::string&) {}, nullptr)
 	                 .IsConnected());
-	EXPECT_EQ(s_FailedAssertions.size(), 1u);
+	EXPECT_EQ(m_Assertions.Take().size(), 1u);
 }
 
 TEST_F(DataStore, ChangesAreToldWhileOthersSubscribe)

@@ -12,7 +12,6 @@ using namespace TesselDataStore;
 using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
-using CoreOrlexTypes::VSubjectRecord;
 using NVX::IO::EType;
 using NVX::IO::VSchemaPointer;
 using NVX::IO::VVariant;
@@ -87,7 +86,7 @@ template <typename T>
 class StoredSubject : public testing::Test
 {
 };
-using VSubjectTypes = testing::Types<VSubject, VSubjectParametrised, VSubjectApplicationData, VSubjectRecord>;
+using VSubjectTypes = testing::Types<VSubject, VSubjectParametrised, VSubjectApplicationData>;
 TYPED_TEST_SUITE(StoredSubject, VSubjectTypes);
 
 TYPED_TEST(StoredSubject, ComesBackEqual)
@@ -104,14 +103,7 @@ TYPED_TEST(StoredSubject, ComesBackEqual)
 	}
 }
 
-template <typename T>
-class CutSubject : public testing::Test
-{
-};
-using VCutTypes = testing::Types<VSubject, VSubjectParametrised, VSubjectApplicationData>;
-TYPED_TEST_SUITE(CutSubject, VCutTypes);
-
-TYPED_TEST(CutSubject, IsRefusedAtEveryByte)
+TYPED_TEST(StoredSubject, IsRefusedAtEveryByte)
 {
 	TypeParam value;
 	VRandomValue(3).Fill(value);

@@ -1,6 +1,7 @@
+#include "../Assertions.h"
+
 #include "numerics/FindTransformBetweenPointsRobust.h"
 
-#include "DebugServices/Assert.h"
 #include "DebugServices/GlobalLog.h"
 #include "math/NumberText.h"
 
@@ -102,10 +103,7 @@ TEST(FindTransformBetweenPointsRobust, MirroredPointsStillGiveARotation)
 TEST(FindTransformBetweenPointsRobust, WithoutATriangleThePoseStays)
 {
 	const double nan = std::nan("");
-	static int s_Asserted;
-	s_Asserted = 0;
-	const auto pEarlier = DebugServices::SetAssertFailHandler([](const char* i_pExpression, const char*, int)
-	    { s_Asserted += std::string(i_pExpression) == "a_rPoints1.size() == a_rPoints2.size()"; });
+	const VAssertions assertions;
 	const std::vector<VVector3> triangle{{0, 0, 0}, {1, 0, 0}, {0, 1, 0}};
 	const std::vector<VVector3> line{{0, 0, 0}, {1, 1, 1}, {2, 2, 2}, {3, 3, 3}};
 	const std::vector<VVector3> bad{{nan, 0, 0}, {nan, 0, 0}, {0, nan, 0}};
@@ -114,12 +112,11 @@ TEST(FindTransformBetweenPointsRobust, WithoutATriangleThePoseStays)
 	EXPECT_FALSE(FindTransformBetweenPointsRobust({{1, 2, 3}, {4, 5, 6}}, {{1, 2, 3}, {4, 5, 6}}, pose));
 	EXPECT_FALSE(FindTransformBetweenPointsRobust(line, line, pose));
 	EXPECT_FALSE(FindTransformBetweenPointsRobust(bad, bad, pose));
-	EXPECT_EQ(s_Asserted, 0);
+	EXPECT_TRUE(assertions.Take().empty());
 	EXPECT_FALSE(FindTransformBetweenPointsRobust(triangle, line, pose));
-	EXPECT_EQ(s_Asserted, 1);
+	EXPECT_EQ(assertions.Take(), std::vector<std::string>{"a_rPoints1.size() == a_rPoints2.size()"});
 	EXPECT_EQ(pose.R, c_Pose.R);
 	EXPECT_EQ(pose.t, c_Pose.t);
-	DebugServices::SetAssertFailHandler(pEarlier);
 }
 
 } // namespace
