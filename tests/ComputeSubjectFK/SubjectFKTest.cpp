@@ -107,13 +107,18 @@ struct VResults
 	explicit VResults(const VComputeSubjectFK& i_rFK)
 	{
 		for (std::size_t i = 0; i < i_rFK.NumberOfSegments(); ++i)
-			m_Worlds.push_back(i_rFK.Segment(i).WorldPose().R);
+		{
+			m_Poses.push_back(i_rFK.Segment(i).WorldPose().R);
+			Rotation::VPose<double> motion;
+			i_rFK.Segment(i).JointBase().GetPose(motion);
+			m_Poses.push_back(motion.R);
+		}
 		i_rFK.ComputeMarkers(m_Markers);
 		i_rFK.ComputeRotations(m_Rotations);
 	}
 	bool operator==(const VResults&) const = default;
 
-	std::vector<Rotation::VMatrix3> m_Worlds;
+	std::vector<Rotation::VMatrix3> m_Poses;
 	std::vector<Rotation::VVector3> m_Markers;
 	std::vector<Rotation::VMatrix3> m_Rotations;
 };
