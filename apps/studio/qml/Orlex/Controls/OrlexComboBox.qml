@@ -149,7 +149,10 @@ Item {
 					found.push(i)
 			}
 			rows = found
-			list.currentIndex = found.length > 0 ? Math.max(0, found.indexOf(before)) : -1
+			// A name typed in full is meant, though longer ones that hold it may come first.
+			const typed = words.length > 0 ? filterField.text.trim().toLowerCase() : null
+			const whole = found.findIndex(i => control.model[i].trim().toLowerCase() === typed)
+			list.currentIndex = whole >= 0 ? whole : found.length > 0 ? Math.max(0, found.indexOf(before)) : -1
 			list.positionViewAtIndex(list.currentIndex, ListView.Contain)
 		}
 		// Wide enough for the longest entry. Below the box, or above it where there is more room.
