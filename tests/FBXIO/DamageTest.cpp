@@ -1,6 +1,6 @@
+#include "../UtilsFileSystem/Log.h"
 #include "SmallFiles.h"
 #include "SoundScene.h"
-#include "TestLog.h"
 
 #include <gtest/gtest.h>
 
@@ -48,7 +48,7 @@ class DamagedFile : public testing::TestWithParam<VSmallFile>
 protected:
 	const std::vector<VTestRecord> m_Records = SmallRecords(GetParam());
 	const std::string m_Bytes = Write(GetParam().m_Form, m_Records);
-	const VTestLog m_Quiet;
+	const VTestLog m_Quiet{"FBXIO"};
 };
 
 TEST_P(DamagedFile, CutAnywhereIsIncomplete)

@@ -1,8 +1,9 @@
+#include "../UtilsFileSystem/Log.h"
+
 #include "FBXIO/FBXReader.h"
 
 #include "FbxFileBuilder.h"
 #include "TestFile.h"
-#include "TestLog.h"
 
 #include <gtest/gtest.h>
 
@@ -16,16 +17,18 @@ using namespace std::string_literals;
 namespace
 {
 
+using VMessages = std::vector<std::string>;
+
 /// What a load tells of the file "PATH".
 struct VLoaded
 {
 	explicit VLoaded(const std::string& i_rBytes) : m_Bytes(i_rBytes)
 	{
-		VTestLog log;
+		VTestLog log("FBXIO");
 		m_bLoaded = m_Reader.LoadMemory(m_Bytes, "PATH");
-		m_Messages = log.m_Messages;
+		m_Messages = log.Take();
 		// The first one is always the same.
-		EXPECT_EQ(m_Messages.front(), (VMessages::value_type{4, "Loading file PATH"}));
+		EXPECT_EQ(m_Messages.front(), "4 Loading file PATH");
 		m_Messages.erase(m_Messages.begin());
 	}
 
@@ -52,13 +55,13 @@ TEST(Reader, WhatIsNoPlainFileIsNotFound)
 	for (const std::string& rPath :
 	    {RETARGET_TEST_DATA "/fbx"s, RETARGET_TEST_DATA "/no such file.fbx"s, ""s, "/dev/null"s})
 	{
-		VTestLog log;
+		VTestLog log("FBXIO");
 		FBXReader reader;
 		EXPECT_FALSE(reader.LoadFile(rPath));
 		EXPECT_FALSE(reader.IsComplete());
 		EXPECT_FALSE(reader.HasSkeleton());
 		EXPECT_EQ(reader.GetSkeleton(), nullptr);
-		EXPECT_EQ(log.m_Messages, (VMessages{{2, "File " + rPath + " not found"}}));
+		EXPECT_EQ(log.Take(), VMessages{"2 File " + rPath + " not found"});
 	}
 }
 
@@ -75,7 +78,7 @@ TEST(Reader, WhatIsNotFbxIsRefused)
 		const VLoaded loaded(bytes);
 		EXPECT_FALSE(loaded.m_bLoaded);
 		EXPECT_EQ(loaded.m_Messages,
-		    (VMessages{{2, "Call to KFbxImporter::Initialize() failed."}, {2, "Error returned: "s + text}}));
+		    (VMessages{"2 Call to KFbxImporter::Initialize() failed.", "2 Error returned: "s + text}));
 	}
 }
 
@@ -88,11 +91,10 @@ TEST(Reader, OtherVersionsAreRefusedWithTheirNumbers)
 		const VLoaded loaded(Write(form, Bones({})));
 		EXPECT_FALSE(loaded.m_bLoaded);
 		EXPECT_EQ(loaded.m_Messages,
-		    (VMessages{{2, "Call to KFbxImporter::Initialize() failed."},
-		        {2, "Error returned: File version is not one of 6.0 to 7.9"},
-		        {2, "FBX file import error: File version is old or too new.\n"},
-		        {2, "FBX version number for file PATH is "s + version + "\n\n"},
-		        {2, "Current FBX version is 2020.0.1\n"}}));
+		    (VMessages{"2 Call to KFbxImporter::Initialize() failed.",
+		        "2 Error returned: File version is not one of 6.0 to 7.9",
+		        "2 FBX file import error: File version is old or too new.\n",
+		        "2 FBX version number for file PATH is "s + version + "\n\n", "2 Current FBX version is 2020.0.1\n"}));
 	}
 }
 
@@ -104,7 +106,7 @@ TEST_P(Reader, TellsOfAPassword)
 	EXPECT_TRUE(loaded.m_bLoaded);
 	EXPECT_FALSE(loaded.m_Reader.IsComplete());
 	EXPECT_FALSE(loaded.m_Reader.HasSkeleton());
-	EXPECT_EQ(loaded.m_Messages, (VMessages{{2, "FBX Importer: password Required"}}));
+	EXPECT_EQ(loaded.m_Messages, (VMessages{"2 FBX Importer: password Required"}));
 }
 
 TEST_P(Reader, KeepsWhatWasReadOfADamagedFile)
@@ -120,12 +122,10 @@ TEST_P(Reader, KeepsWhatWasReadOfADamagedFile)
 	EXPECT_EQ(loaded.m_Reader.GetUpAxis(), 0);
 	ASSERT_TRUE(loaded.m_Reader.HasSkeleton());
 	EXPECT_EQ(loaded.m_Reader.GetSkeleton()->front().m_Name, "hips");
-	ASSERT_EQ(loaded.m_Messages.size(), 1u);
-	EXPECT_EQ(loaded.m_Messages[0].first, 2);
 	const bool bBinary = GetParam().m_Form == EForm::Binary;
 	const std::string what = bBinary ? "the values of a record are damaged" : "the name of a record is missing";
-	EXPECT_EQ(loaded.m_Messages[0].second,
-	    "Error returned: File is corrupted: " + what + " (byte " + std::to_string(at) + ")");
+	EXPECT_EQ(loaded.m_Messages,
+	    VMessages{"2 Error returned: File is corrupted: " + what + " (byte " + std::to_string(at) + ")"});
 }
 
 TEST_P(Reader, AxesThatAreNoneAreX)
@@ -150,9 +150,8 @@ TEST_P(Reader, TransformsThatAreNotFiniteBecomeTheIdentity)
 	    {"c", "LimbNode", -1, {{"RotationActive", {1}}, {"PreRotation", {INFINITY, 0, 0}}}},
 	    {"d", "LimbNode", -1, {{"Lcl Translation", {1e300, 0, 0}}}}});
 	const VLoaded loaded(Write(GetParam(), scene));
-	const auto invalid = [](const char* i_pName) -> VMessages::value_type {
-		return {2, "Invalid transform for: "s + i_pName + "; setting to identity"};
-	};
+	const auto invalid = [](const char* i_pName)
+	{ return "2 Invalid transform for: "s + i_pName + "; setting to identity"; };
 	// The pre-rotation, the local and the global matrix in turn.
 	EXPECT_EQ(loaded.m_Messages,
 	    (VMessages{invalid("a"), invalid("a"), invalid("b"), invalid("c"), invalid("c"), invalid("c"), invalid("d"),
@@ -172,7 +171,7 @@ TEST_P(Reader, ProgressRisesAndCanEndTheImport)
 	for (std::size_t end = 0;; ++end)
 	{
 		told.clear();
-		VTestLog log;
+		VTestLog log("FBXIO");
 		FBXReader reader;
 		reader.SetProgress(
 		    [&](float i_Part)
@@ -184,7 +183,7 @@ TEST_P(Reader, ProgressRisesAndCanEndTheImport)
 		const bool bEnded = told.size() == end + 1;
 		EXPECT_EQ(reader.IsComplete(), !bEnded);
 		EXPECT_EQ(reader.HasSkeleton(), !bEnded);
-		EXPECT_EQ(log.m_Messages.back().second == "Error returned: Import was cancelled", bEnded);
+		EXPECT_EQ(log.Take().back() == "2 Error returned: Import was cancelled", bEnded);
 		if (!bEnded)
 			break;
 	}

@@ -1,7 +1,8 @@
+#include "../UtilsFileSystem/Log.h"
+
 #include "FBXIO/FBXReader.h"
 
 #include "MeshFile.h"
-#include "TestLog.h"
 
 #include <QBuffer>
 #include <QImage>
@@ -184,7 +185,7 @@ TEST_P(Material, TexturesOfLayersGoToTheMaterialsOfTheirPolygons)
 	WritePicture("a.png", 1);
 	WritePicture("b.png", 2);
 	const std::string several =
-	    "Polygons of one material of body have several textures; each material gets the first of its own";
+	    "3 Polygons of one material of body have several textures; each material gets the first of its own";
 	const struct
 	{
 		const char* m_pName;
@@ -204,14 +205,15 @@ TEST_P(Material, TexturesOfLayersGoToTheMaterialsOfTheirPolygons)
 	for (const auto& rRow : rows)
 	{
 		SCOPED_TRACE(rRow.m_pName);
-		VTestLog log;
+		VTestLog log("FBXIO");
 		const std::vector<VMeshPart> parts = Read(
 		    {{"lambert", {}, Path("a.png"), ""}, {"phong", {}, Path("b.png"), ""}}, rRow.m_Materials, rRow.m_Textures);
 		ASSERT_EQ(parts.size(), 2u);
 		for (int i = 0; i < 2; ++i)
 			EXPECT_EQ(parts[i].m_pTexture ? parts[i].m_pTexture->width() : 0, rRow.m_Widths[i]) << i;
-		ASSERT_EQ(log.m_Messages.size(), rRow.m_Message.empty() ? 1u : 2u);
-		EXPECT_TRUE(rRow.m_Message.empty() || log.m_Messages[1].second == rRow.m_Message);
+		const std::vector<std::string> messages = log.Take();
+		ASSERT_EQ(messages.size(), rRow.m_Message.empty() ? 1u : 2u);
+		EXPECT_TRUE(rRow.m_Message.empty() || messages[1] == rRow.m_Message);
 	}
 }
 

@@ -1,7 +1,8 @@
+#include "../UtilsFileSystem/Log.h"
+
 #include "FBXIO/FBXReader.h"
 
 #include "MeshFile.h"
-#include "TestLog.h"
 
 #include <gtest/gtest.h>
 
@@ -16,6 +17,8 @@ using namespace std::string_literals;
 
 namespace
 {
+
+using VMessages = std::vector<std::string>;
 
 /// A square of two units: control points 0 to 3, counted round.
 const VNumbers c_Square{0, 0, 0, 2, 0, 0, 2, 2, 0, 0, 2, 0};
@@ -43,8 +46,8 @@ std::vector<std::uint32_t> Indices(const VMeshPart& i_rPart)
 /// What is told, but for the first line of each load.
 VMessages Told(VTestLog& io_rLog)
 {
-	VMessages messages = std::exchange(io_rLog.m_Messages, {});
-	std::erase_if(messages, [](const auto& i_rMessage) { return i_rMessage.second.starts_with("Loading file"); });
+	VMessages messages = io_rLog.Take();
+	std::erase_if(messages, [](const std::string& i_rText) { return i_rText.starts_with("4 Loading file"); });
 	return messages;
 }
 
@@ -63,7 +66,7 @@ protected:
 		return meshes.empty() ? VBasicMesh() : std::move(meshes.front().m_Mesh);
 	}
 
-	VTestLog m_Log;
+	VTestLog m_Log{"FBXIO"};
 };
 
 INSTANTIATE_TEST_SUITE_P(
@@ -113,13 +116,13 @@ const VTexCoordRow c_TexCoordRows[]{
     {"AnIndexForTwoControlPointsMovesTheSecond",
         {"ByPolygonVertex", "IndexToDirect", {0, 0, 1, 0, 1, 1}, {0, 1, 2, 0, 2, 1}},
         {{0, 0, 0, 0}, {20, 0, 1, 0}, {20, 20, 1, 1}}, {0, 1, 2, 0, 2, 1},
-        {{3, "1 polygon vertices of mesh body are moved to other control points that share their texture coordinate"}}},
+        {"3 1 polygon vertices of mesh body are moved to other control points that share their texture coordinate"}},
     {"WithoutIndexThePositionServes", {"ByPolygonVertex", "Direct", {0, 0, 1, 0, 1, 1, 0, 0.5, 1, 0.5, 0, 1}, {}},
         {{0, 0, 0, 0}, {20, 0, 1, 0}, {20, 20, 1, 1}, {0, 0, 0, 0.5}, {20, 20, 1, 0.5}, {0, 20, 0, 1}},
         {0, 1, 2, 3, 4, 5}, {}},
     {"IndicesOutOfRange", {"ByPolygonVertex", "IndexToDirect", {0, 0, 1, 0, 1, 1}, {0, 1, 2, 0, 77, -1}},
         {{0, 0, 0, 0}, {20, 0, 1, 0}, {20, 20, 1, 1}, {20, 20, 0, 0}, {0, 20, 0, 0}}, {0, 1, 2, 0, 3, 4},
-        {{3, "2 vertices of mesh body have no texture coordinate"}}},
+        {"3 2 vertices of mesh body have no texture coordinate"}},
     {"OtherMappingsAreNone", {"ByPolygon", "Direct", {1, 1, 1, 1}, {}},
         {{0, 0, 0, 0}, {20, 0, 0, 0}, {20, 20, 0, 0}, {0, 20, 0, 0}}, {0, 1, 2, 0, 2, 3}, {}},
 };
@@ -154,7 +157,7 @@ struct VPartsRow
 TEST_P(Mesh, PartsByMaterial)
 {
 	const std::string owner = GetParam().m_Version >= 7000 ? "bodyShape" : "body";
-	const VMessages missing{{3, "Missing material for mesh " + owner}};
+	const VMessages missing{"3 Missing material for mesh " + owner};
 	const std::vector<std::uint32_t> quad{0, 1, 2, 0, 2, 3};
 	const std::vector<std::uint32_t> triangle{3, 2, 0};
 	const std::vector<std::uint32_t> both{0, 1, 2, 0, 2, 3, 3, 2, 0};
@@ -201,12 +204,10 @@ TEST_P(Mesh, DamageIsToldAndLeftOut)
 	EXPECT_EQ(Indices(mesh.m_Parts.at(0)), (std::vector<std::uint32_t>{0, 1, 2}));
 	const std::string owner = GetParam().m_Version >= 7000 ? "bodyShape" : "body";
 	EXPECT_EQ(Told(m_Log),
-	    (VMessages{{3,
-	                   "Polygons left out of mesh " + owner
-	                       + " because they have no end or name control points that do not exist: 2"},
-	        {3,
-	            "1 control points of mesh body have coordinates or normals that are no numbers; setting these to "
-	            "zero"}}));
+	    (VMessages{"3 Polygons left out of mesh " + owner
+	            + " because they have no end or name control points that do not exist: 2",
+	        "3 1 control points of mesh body have coordinates or normals that are no numbers; setting these to "
+	        "zero"}));
 }
 
 /// A strip of triangles over this many control points, of which the last is the last corner.
@@ -292,7 +293,7 @@ TEST_P(Mesh, PlaceThatIsNotFiniteIsTheIdentity)
 	reader.ReadPlacedMeshes(placed);
 	ASSERT_EQ(placed.size(), 1u);
 	EXPECT_TRUE(placed[0].m_Transform.isIdentity());
-	EXPECT_EQ(Told(m_Log), (VMessages{{2, "Invalid transform for: body; setting to identity"}}));
+	EXPECT_EQ(Told(m_Log), (VMessages{"2 Invalid transform for: body; setting to identity"}));
 }
 
 } // namespace

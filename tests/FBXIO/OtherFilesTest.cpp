@@ -1,6 +1,6 @@
-#include "FBXIO/FBXReader.h"
+#include "../UtilsFileSystem/Log.h"
 
-#include "TestLog.h"
+#include "FBXIO/FBXReader.h"
 
 #include <gtest/gtest.h>
 
@@ -50,13 +50,13 @@ TEST(OtherFiles, AreReadAsTheTableTells)
 	{
 		ASSERT_EQ(rRow.size(), 7u) << rRow[0];
 		SCOPED_TRACE(rRow[0]);
-		FbxTest::VTestLog log;
+		VTestLog log("FBXIO");
 		FBXReader reader;
 		const bool bLoaded = reader.LoadFile((folder / rRow[0]).string());
 		EXPECT_EQ(bLoaded, !rRow[6].starts_with("refused"));
 		if (!bLoaded)
 		{
-			const std::string reason = log.m_Messages.back().second.substr(std::string("Error returned: ").size());
+			const std::string reason = log.Take().back().substr(std::string("2 Error returned: ").size());
 			EXPECT_NE(rRow[6].find('"' + reason + '"'), std::string::npos) << reason;
 			continue;
 		}
@@ -67,8 +67,9 @@ TEST(OtherFiles, AreReadAsTheTableTells)
 		for (const VPlacedMesh& rMesh : meshes)
 			for (const VMeshPart& rPart : rMesh.m_Mesh.m_Parts)
 				triangles += rPart.m_Indices.size() / (3 * rPart.m_IndexSize);
-		const auto warnings = std::count_if(
-		    log.m_Messages.begin(), log.m_Messages.end(), [](const auto& i_rMessage) { return i_rMessage.first <= 3; });
+		const std::vector<std::string> told = log.Take();
+		const auto warnings =
+		    std::count_if(told.begin(), told.end(), [](const std::string& i_rText) { return i_rText[0] <= '3'; });
 		EXPECT_EQ(std::to_string(reader.HasSkeleton() ? reader.GetSkeleton()->size() : 0), rRow[2]);
 		EXPECT_EQ(std::to_string(meshes.size()), rRow[3]);
 		EXPECT_EQ(std::to_string(triangles), rRow[4]);

@@ -1,7 +1,8 @@
+#include "../UtilsFileSystem/Log.h"
+
 #include "FBXIO/FBXReader.h"
 
 #include "MeshFile.h"
-#include "TestLog.h"
 
 #include <gtest/gtest.h>
 
@@ -14,6 +15,7 @@ using namespace std::string_literals;
 namespace
 {
 
+using VMessages = std::vector<std::string>;
 using VBytes = std::array<std::uint8_t, 4>;
 
 /// Three points and a triangle of them, in the node at this place.
@@ -39,12 +41,12 @@ protected:
 		VSkin skin;
 		reader.ReadSkin(skin);
 		m_pFull = reader.GetSkeleton();
-		m_Messages = std::exchange(m_Log.m_Messages, {});
+		m_Messages = m_Log.Take();
 		m_Messages.erase(m_Messages.begin());
 		return skin;
 	}
 
-	VTestLog m_Log;
+	VTestLog m_Log{"FBXIO"};
 	VMessages m_Messages;
 	std::shared_ptr<const VSkinSkeleton> m_pFull;
 };
@@ -62,7 +64,7 @@ struct VWeightsRow
 	VMessages m_Messages;
 };
 
-const VMessages c_Unweighted{{3, "1 unweighted vertices in mesh body"}};
+const VMessages c_Unweighted{"3 1 unweighted vertices in mesh body"};
 
 const VWeightsRow c_WeightsRows[]{
     {"One", {0.3}, {1, 0, 0, 0}, {255, 0, 0, 0}, {}},
@@ -70,13 +72,13 @@ const VWeightsRow c_WeightsRows[]{
     {"TheLargestFirst", {0.25, 0.75}, {2, 1, 0, 0}, {191, 63, 0, 0}, {}},
     {"FourFit", {0.125, 0.25, 0.5, 0.125}, {3, 2, 1, 4}, {127, 63, 31, 31}, {}},
     {"SixKeepFour", {0.4, 0.3, 0.1, 0.1, 0.05, 0.05}, {1, 2, 3, 4}, {113, 85, 28, 28},
-        {{6, "Too many bones on 1 vertices, with maximum contribution of 5%"}}},
+        {"6 Too many bones on 1 vertices, with maximum contribution of 5%"}},
     {"AnySumCountsAsAll", {6, 2}, {1, 2, 0, 0}, {191, 63, 0, 0}, {}},
     {"NoCluster", {}, {0, 0, 0, 0}, {0, 0, 0, 0}, c_Unweighted},
     {"NoWeight", {0, 0}, {1, 2, 0, 0}, {0, 0, 0, 0}, c_Unweighted},
     {"BelowZero", {1, -2}, {1, 2, 0, 0}, {0, 0, 0, 0}, c_Unweighted},
     {"NotANumber", {std::nan(""), 1}, {2, 0, 0, 0}, {255, 0, 0, 0},
-        {{3, "1 weights of mesh body left out because they are no numbers or name control points that do not exist"}}},
+        {"3 1 weights of mesh body left out because they are no numbers or name control points that do not exist"}},
 };
 
 TEST_P(Skin, WeightsAreCutToFourBytes)
@@ -114,7 +116,7 @@ TEST_P(Skin, TheLargestDroppedWeightIsTold)
 		    {i, {0, 1, 2}, {i == 3 ? 0.1 : 0.225, i == 1 ? 0.125 : 0.25, i == 5 ? 0.0625 : 0.3}, {}, {}});
 	}
 	Read(scene, {Triangle(0, clusters)});
-	EXPECT_EQ(m_Messages, (VMessages{{6, "Too many bones on 3 vertices, with maximum contribution of 12.5%"}}));
+	EXPECT_EQ(m_Messages, (VMessages{"6 Too many bones on 3 vertices, with maximum contribution of 12.5%"}));
 }
 
 TEST_P(Skin, VerticesOfTextureCoordinatesKeepTheirBones)
@@ -140,7 +142,7 @@ TEST_P(Skin, MissingBonesPullToTheFirst)
 	const VSkin skin = Read(scene,
 	    {Triangle(
 	        3, {{2, {0, 1}, {1, 1}, {}, {}}, {1, {2}, {0.5}, {}, {}}, {-1, {2}, {0.5}, {}, {}}, {2, {}, {}, {}, {}}})});
-	const VMessages::value_type missing{2, "Missing bone plain for cluster body cluster1"};
+	const std::string missing = "2 Missing bone plain for cluster body cluster1";
 	EXPECT_EQ(m_Messages, (VMessages{missing, missing})) << "once for the skeleton and once for the weights";
 	ASSERT_EQ(skin.m_Meshes.size(), 1u);
 	EXPECT_EQ(skin.m_Meshes[0].m_Vertices[0].m_BoneIndices, (VBytes{1, 0, 0, 0}));
@@ -183,7 +185,7 @@ TEST_P(Skin, ClustersOfUnevenListsKeepThePairs)
 	const VTestScene scene{{{"root", "LimbNode", -1, {}}, {"body", "Mesh", -1, {}}}, {}, {}, {}};
 	const VSkin skin = Read(scene, {Triangle(1, {{0, {0, 1, 2}, {1, 1}, {}, {}}})});
 	EXPECT_EQ(m_Messages,
-	    (VMessages{{3, "Cluster body cluster0 has 3 indices and 2 weights; the rest is left out"}, c_Unweighted[0]}));
+	    (VMessages{"3 Cluster body cluster0 has 3 indices and 2 weights; the rest is left out", c_Unweighted[0]}));
 	EXPECT_EQ(skin.m_Meshes.at(0).m_Vertices[1].m_BoneWeights, (VBytes{255, 0, 0, 0}));
 }
 
@@ -199,11 +201,11 @@ TEST_P(Skin, WhatIsFoundOfAMeshIsToldOnce)
 	ASSERT_TRUE(reader.LoadMemory(file, "PATH"));
 	std::vector<VPlacedMesh> placed;
 	reader.ReadPlacedMeshes(placed);
-	EXPECT_EQ(m_Log.m_Messages.size(), 5u) << "the load, a number, a moved and an unmapped vertex, no material";
+	EXPECT_EQ(m_Log.Take().size(), 5u) << "the load, a number, a moved and an unmapped vertex, no material";
 	VSkin skin;
 	reader.ReadSkin(skin);
 	EXPECT_EQ(skin.m_Meshes.size(), 1u);
-	EXPECT_EQ(m_Log.m_Messages.size(), 5u);
+	EXPECT_EQ(m_Log.Take().size(), 0u);
 }
 
 TEST_P(Skin, MeshesWithoutSkinAreNoPartOfIt)

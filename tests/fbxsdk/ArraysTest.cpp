@@ -1,9 +1,10 @@
+#include "../UtilsFileSystem/Log.h"
+
 #include "fbxsdk/container/Arrays.h"
 #include "fbxsdk/container/FileKind.h"
 #include "fbxsdk/scene/ArraySource.h"
 
 #include "FbxFileBuilder.h"
-#include "TestLog.h"
 
 #include <gtest/gtest.h>
 
@@ -156,9 +157,9 @@ TEST(Arrays, TogetherAreReadAsOneByOne)
 	std::vector<VDecodeJob> jobs;
 	for (std::size_t i = 0; i < records.size(); ++i)
 		jobs.push_back({{&tree, &budget, VElementIndex(i + 1)}, "owner", &numbers[i]});
-	VTestLog log;
+	VTestLog log("FBXIO");
 	Decode(jobs);
-	VMessages messages;
+	std::vector<std::string> messages;
 	for (std::size_t i = 0; i < records.size(); ++i)
 	{
 		VArrayNumbers<double> expected;
@@ -166,10 +167,10 @@ TEST(Arrays, TogetherAreReadAsOneByOne)
 		EXPECT_EQ(jobs[i].m_bSound, i % 7 != 3 && i < 38) << i;
 		EXPECT_EQ(numbers[i], expected) << i;
 		if (!jobs[i].m_bSound)
-			messages.emplace_back(
-			    3, "Array " + records[i].m_Name + " of owner left out because it is damaged or too large");
+			messages.push_back(
+			    "3 Array " + records[i].m_Name + " of owner left out because it is damaged or too large");
 	}
-	EXPECT_EQ(log.m_Messages, messages);
+	EXPECT_EQ(log.Take(), messages);
 	EXPECT_EQ(budget.m_BytesLeft, 0u);
 }
 

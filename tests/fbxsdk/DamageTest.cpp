@@ -1,8 +1,9 @@
+#include "../UtilsFileSystem/Log.h"
+
 #include "fbxsdk/Limits.h"
 
 #include "FbxFileBuilder.h"
 #include "Imported.h"
-#include "TestLog.h"
 
 using namespace FbxTest;
 using namespace std::string_literals;
@@ -20,7 +21,7 @@ struct VResult
 /// Imports and evaluates everything.
 VResult Load(const std::string& i_rBytes)
 {
-	const VTestLog quiet;
+	const VTestLog quiet("FBXIO");
 	VImported file(i_rBytes);
 	VResult result{file.m_bInitialized, file.m_bImported, 0};
 	std::vector<FbxNode*> open{file.Root()};

@@ -1,6 +1,6 @@
+#include "../UtilsFileSystem/Log.h"
 #include "FbxFileBuilder.h"
 #include "Imported.h"
-#include "TestLog.h"
 
 #include <Eigen/Geometry>
 
@@ -48,7 +48,7 @@ TEST(Scene, BrokenConnectionsAreLeftOutAndTold)
 {
 	for (const VTestForm& rForm : c_Forms)
 	{
-		VTestLog log;
+		VTestLog log("FBXIO");
 		const VTestScene scene{{{"a", "LimbNode", -1, {}}, {"b", "LimbNode", 0, {}}, {"ring1", "Null", 3, {}},
 		                           {"ring2", "Null", 2, {}}, {"below", "Null", 2, {}}, {"self", "Null", 5, {}}},
 		    {}, {}, {{1, -1}, {1, 0}}};
@@ -69,11 +69,11 @@ TEST(Scene, BrokenConnectionsAreLeftOutAndTold)
 		EXPECT_TRUE(file.m_bImported);
 		EXPECT_EQ(Outline(file.Root()), "RootNode(a*(b*))") << rForm.m_pName;
 		EXPECT_EQ(file.Root()->GetChildCount(true), 2);
-		const VMessages expected{
-		    {3, "Connections left out because their node has another parent: 1, such as that of b"},
-		    {4, "Nodes left out because no connection leads to them: 1"},
-		    {3, "Nodes left out because their connections lead round in a ring: 4"}};
-		EXPECT_EQ(log.m_Messages, expected) << rForm.m_pName;
+		const std::vector<std::string> expected{
+		    "3 Connections left out because their node has another parent: 1, such as that of b",
+		    "4 Nodes left out because no connection leads to them: 1",
+		    "3 Nodes left out because their connections lead round in a ring: 4"};
+		EXPECT_EQ(log.Take(), expected) << rForm.m_pName;
 	}
 }
 
