@@ -46,6 +46,24 @@ const std::size_t c_Step = 1;
 class DamagedFile : public testing::TestWithParam<VSmallFile>
 {
 protected:
+	/// @return how many of what i_rMutate makes could be read in full.
+	static std::size_t ExpectSoundOfSeeds(
+	    std::size_t i_Count, const std::function<std::string(std::mt19937&)>& i_rMutate)
+	{
+		std::size_t complete = 0;
+		OnSmallStack(
+		    [&]
+		    {
+			    for (std::size_t seed = 0; seed < i_Count && !HasFailure(); ++seed)
+			    {
+				    SCOPED_TRACE(seed);
+				    std::mt19937 random{std::mt19937::result_type(seed)};
+				    complete += ExpectSound(i_rMutate(random));
+			    }
+		    });
+		return complete;
+	}
+
 	const std::vector<VTestRecord> m_Records = SmallRecords(GetParam());
 	const std::string m_Bytes = Write(GetParam().m_Form, m_Records);
 	const VTestLog m_Quiet{"FBXIO"};
@@ -82,40 +100,25 @@ TEST_P(DamagedFile, FourPatchesOfEveryByte)
 
 TEST_P(DamagedFile, MutatedBytes)
 {
-	OnSmallStack(
-	    [this]
-	    {
-		    std::size_t complete = 0;
-		    const std::size_t count = Times(170);
-		    for (std::size_t seed = 0; seed < count && !HasFailure(); ++seed)
-		    {
-			    SCOPED_TRACE(seed);
-			    std::mt19937 random{std::mt19937::result_type(seed)};
-			    complete += ExpectSound(MutateBytes(m_Bytes, random));
-		    }
-		    EXPECT_GT(complete, 0u);
-		    EXPECT_LT(complete, count / 2);
-	    });
+	const std::size_t count = Times(170);
+	const std::size_t complete =
+	    ExpectSoundOfSeeds(count, [this](std::mt19937& io_rRandom) { return MutateBytes(m_Bytes, io_rRandom); });
+	EXPECT_GT(complete, 0u);
+	EXPECT_LT(complete, count / 2);
 }
 
 TEST_P(DamagedFile, MutatedRecords)
 {
-	OnSmallStack(
-	    [this]
+	const std::size_t count = Times(34);
+	const std::size_t complete = ExpectSoundOfSeeds(count,
+	    [this](std::mt19937& io_rRandom)
 	    {
-		    std::size_t complete = 0;
-		    const std::size_t count = Times(34);
-		    for (std::size_t seed = 0; seed < count && !HasFailure(); ++seed)
-		    {
-			    SCOPED_TRACE(seed);
-			    std::mt19937 random{std::mt19937::result_type(seed)};
-			    // Some in the form of another version than that of their records.
-			    const VTestForm& rForm = random() % 8 == 0 ? c_Forms[random() % 5] : GetParam().m_Form;
-			    complete += ExpectSound(Write(rForm, MutateRecords(m_Records, random)));
-		    }
-		    EXPECT_GT(complete, count / 5);
-		    EXPECT_LT(complete, count);
+		    // Some in the form of another version than that of their records.
+		    const VTestForm& rForm = io_rRandom() % 8 == 0 ? c_Forms[io_rRandom() % 5] : GetParam().m_Form;
+		    return Write(rForm, MutateRecords(m_Records, io_rRandom));
 	    });
+	EXPECT_GT(complete, count / 5);
+	EXPECT_LT(complete, count);
 }
 
 INSTANTIATE_TEST_SUITE_P(Small, DamagedFile, testing::ValuesIn(c_SmallFiles),

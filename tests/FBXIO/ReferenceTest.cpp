@@ -199,19 +199,17 @@ TEST_P(ReferenceFile, SkinsAgree)
 INSTANTIATE_TEST_SUITE_P(Files, ReferenceFile, testing::ValuesIn(Files()),
     [](const auto& i_rInfo) { return i_rInfo.param.substr(i_rInfo.param.find('/') + 1); });
 
-/// What one exporter wrote of one character in binary and as text, which has fewer digits.
+/// What one exporter wrote of one character in binary and as text, which has fewer digits: closer to each other than to
+/// what other programs find.
 TEST(ReferenceTwins, ReadToTheSameValues)
 {
-	std::vector<VPlacedMesh> placed[2];
 	VSkin skins[2];
 	for (const int i : {0, 1})
 	{
 		FBXReader reader;
 		ASSERT_TRUE(reader.LoadFile(c_Folder + (i == 0 ? "own_ns_yup_cm_a7400.fbx" : "own_ns_yup_cm_b7400.fbx")));
-		reader.ReadPlacedMeshes(placed[i]);
 		reader.ReadSkin(skins[i]);
 	}
-	ASSERT_EQ(placed[0].size(), placed[1].size());
 	ASSERT_EQ(skins[0].m_Meshes.size(), skins[1].m_Meshes.size());
 	ASSERT_EQ(skins[0].m_pSkeleton->size(), skins[1].m_pSkeleton->size());
 	const auto near = [](const QMatrix4x4& i_rA, const QMatrix4x4& i_rB)
@@ -230,11 +228,6 @@ TEST(ReferenceTwins, ReadToTheSameValues)
 		for (const auto member :
 		    {&VSkinBone::m_PreRotation, &VSkinBone::m_InverseBind, &VSkinBone::m_Local, &VSkinBone::m_Global})
 			EXPECT_TRUE(near(rA.*member, rB.*member)) << rA.m_Name;
-	}
-	for (std::size_t i = 0; i < placed[0].size(); ++i)
-	{
-		EXPECT_EQ(placed[0][i].m_Name, placed[1][i].m_Name);
-		EXPECT_TRUE(near(placed[0][i].m_Transform, placed[1][i].m_Transform));
 	}
 	for (std::size_t i = 0; i < skins[0].m_Meshes.size(); ++i)
 	{

@@ -20,7 +20,7 @@ struct VRow
 };
 
 /// Runs the rows; none may leave a file behind that was not there.
-inline void RunRows(const std::vector<VRow>& i_rRows, const VScratchFolder& i_rFolder)
+inline void RunRows(const std::vector<VRow>& i_rRows, const VScratchFolder& i_rFolder = {})
 {
 	for (const VRow& rRow : i_rRows)
 	{

@@ -14,47 +14,41 @@ std::vector<std::string> Create(std::vector<std::string> i_Edits)
 
 TEST(Usage, HelpAndVersion)
 {
-	const VScratchFolder folder;
-	RunRows(
-	    {
-	        {"help", {"--help"}, 0, "retarget create --fbx hero.fbx --source performer.qrs", ""},
-	        {"help of a command", {"create", "--help"}, 0, "--match-file-pose", ""},
-	        {"help as a word", {"help", "fk"}, 0, "bind|mean|tpose", ""},
-	        {"version", {"--version"}, 0, "retarget 0.", ""},
-	        {"nothing", {}, 2, "", "Usage: retarget COMMAND"},
-	        {"every help has examples", {"schema", "-h"}, 0, "Examples:\n  retarget schema", ""},
-	    },
-	    folder);
+	RunRows({
+	    {"help", {"--help"}, 0, "retarget create --fbx hero.fbx --source performer.qrs", ""},
+	    {"help of a command", {"create", "--help"}, 0, "--match-file-pose", ""},
+	    {"help as a word", {"help", "fk"}, 0, "bind|mean|tpose", ""},
+	    {"version", {"--version"}, 0, "retarget 0.", ""},
+	    {"nothing", {}, 2, "", "Usage: retarget COMMAND"},
+	    {"every help has examples", {"schema", "-h"}, 0, "Examples:\n  retarget schema", ""},
+	});
 }
 
 TEST(Usage, WrongWords)
 {
-	const VScratchFolder folder;
-	RunRows(
-	    {
-	        {"unknown command", {"creat", "--fbx", "x"}, 2, "",
-	            "error retarget: there is no command \"creat\"; did you mean \"create\"?; see \"retarget --help\"\n"},
-	        {"unknown option", {"dump", "--evaluatd", "x"}, 2, "",
-	            "error retarget: there is no option \"--evaluatd\"; did you mean \"--evaluated\"?"},
-	        {"option of another command", {"edit", "x", "--match-file-pose", "-o", "y"}, 2, "", "--match-file-pose"},
-	        {"not offered", {"solve", "x"}, 2, "", "error retarget: there is no command \"solve\"; see"},
-	        {"too many", {"dump", "x", "y"}, 2, "", "error retarget: \"y\" is one argument too many; see"},
-	        {"missing file", {"dump"}, 2, "", "error retarget: FILE is required; see \"retarget dump --help\""},
-	        {"missing output", {"create", "--fbx", c_Fbx}, 2, "", "--output is required"},
-	        {"missing value", {"create", "--fbx"}, 2, "", "--fbx"},
-	        {"level", {"--log", "FBXIO=loud", "schema"}, 2, "", "\"FBXIO=loud\" is not CATEGORY=LEVEL"},
-	        {"context", {"eval", "1", "--context", "cubic"}, 2, "", "cubic not in {static,linear,full}"},
-	        {"pose", {"fk", c_Performer, "--pose", "rest"}, 2, "", "rest not in {bind,mean,tpose}"},
-	        {"version", {"convert", c_Performer, "x.qrs", "--format-version", "3.6"}, 2, "",
-	            "the format has no version \"3.6\", only 1.0 1.5 2.0"},
-	        {"size", {"render", "x.qrr", "-o", "x.png", "--size", "64x9"}, 2, "",
-	            "--size: \"64x9\" is not WIDTHxHEIGHT with 16 to 4096 pixels each"},
-	        {"size in words", {"render", "x.qrr", "-o", "x.png", "--size", "64x64x"}, 2, "", "is not WIDTHxHEIGHT"},
-	        {"view", {"render", "x.qrr", "-o", "x.png", "--view", "side"}, 2, "", "side not in {perspective,front,"},
-	        {"no picture", {"render", "x.qrr", "-o", "x.jpg"}, 2, "", "\"x.jpg\": the picture is written as PNG"},
-	        {"state", {"fk", c_Performer, "--state", "1,2"}, 2, "", "take 67 numbers, not 2"},
-	    },
-	    folder);
+	RunRows({
+	    {"unknown command", {"creat", "--fbx", "x"}, 2, "",
+	        "error retarget: there is no command \"creat\"; did you mean \"create\"?; see \"retarget --help\"\n"},
+	    {"unknown option", {"dump", "--evaluatd", "x"}, 2, "",
+	        "error retarget: there is no option \"--evaluatd\"; did you mean \"--evaluated\"?"},
+	    {"option of another command", {"edit", "x", "--match-file-pose", "-o", "y"}, 2, "", "--match-file-pose"},
+	    {"not offered", {"solve", "x"}, 2, "", "error retarget: there is no command \"solve\"; see"},
+	    {"too many", {"dump", "x", "y"}, 2, "", "error retarget: \"y\" is one argument too many; see"},
+	    {"missing file", {"dump"}, 2, "", "error retarget: FILE is required; see \"retarget dump --help\""},
+	    {"missing output", {"create", "--fbx", c_Fbx}, 2, "", "--output is required"},
+	    {"missing value", {"create", "--fbx"}, 2, "", "--fbx"},
+	    {"level", {"--log", "FBXIO=loud", "schema"}, 2, "", "\"FBXIO=loud\" is not CATEGORY=LEVEL"},
+	    {"context", {"eval", "1", "--context", "cubic"}, 2, "", "cubic not in {static,linear,full}"},
+	    {"pose", {"fk", c_Performer, "--pose", "rest"}, 2, "", "rest not in {bind,mean,tpose}"},
+	    {"version", {"convert", c_Performer, "x.qrs", "--format-version", "3.6"}, 2, "",
+	        "the format has no version \"3.6\", only 1.0 1.5 2.0"},
+	    {"size", {"render", "x.qrr", "-o", "x.png", "--size", "64x9"}, 2, "",
+	        "--size: \"64x9\" is not WIDTHxHEIGHT with 16 to 4096 pixels each"},
+	    {"size in words", {"render", "x.qrr", "-o", "x.png", "--size", "64x64x"}, 2, "", "is not WIDTHxHEIGHT"},
+	    {"view", {"render", "x.qrr", "-o", "x.png", "--view", "side"}, 2, "", "side not in {perspective,front,"},
+	    {"no picture", {"render", "x.qrr", "-o", "x.jpg"}, 2, "", "\"x.jpg\": the picture is written as PNG"},
+	    {"state", {"fk", c_Performer, "--state", "1,2"}, 2, "", "take 67 numbers, not 2"},
+	});
 }
 
 TEST(Usage, OutputsThatWouldDestroy)
@@ -78,43 +72,36 @@ TEST(Usage, OutputsThatWouldDestroy)
 
 TEST(Usage, EditsThatNameWhatIsNotThere)
 {
-	const VScratchFolder folder;
-	RunRows(
-	    {
-	        {"source name", Create({"--position", "Hisp:Hips"}), 2, "",
-	            "error retarget: there is no source segment \"Hisp\"; did you mean \"Hips\", "},
-	        {"second edit", Create({"--rotation", "Hips:Hips", "--rotation", "Head:Haed"}), 2, "",
-	            "there is no target segment \"Haed\"; did you mean \"Head\", "},
-	        {"no source", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--position", "Hips:Hips"}, 2, "",
-	            "--position needs the performer's skeleton: give it with --source FILE.qrs"},
-	        {"no source to update", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--update-targets"}, 2, "",
-	            "--update-targets needs the performer's skeleton"},
-	        {"no targets", Create({"--remove-target", "0"}), 2, "", "there is no target #0; there is no target at all"},
-	        {"root name", Create({"--root", "Hip"}), 2, "", "there is no bone \"Hip\"; did you mean \"Hips\""},
-	        {"empty root", Create({"--root", ""}), 2, "", "there is no bone \"\""},
-	    },
-	    folder);
+	RunRows({
+	    {"source name", Create({"--position", "Hisp:Hips"}), 2, "",
+	        "error retarget: there is no source segment \"Hisp\"; did you mean \"Hips\", "},
+	    {"second edit", Create({"--rotation", "Hips:Hips", "--rotation", "Head:Haed"}), 2, "",
+	        "there is no target segment \"Haed\"; did you mean \"Head\", "},
+	    {"no source", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--position", "Hips:Hips"}, 2, "",
+	        "--position needs the performer's skeleton: give it with --source FILE.qrs"},
+	    {"no source to update", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--update-targets"}, 2, "",
+	        "--update-targets needs the performer's skeleton"},
+	    {"no targets", Create({"--remove-target", "0"}), 2, "", "there is no target #0; there is no target at all"},
+	    {"root name", Create({"--root", "Hip"}), 2, "", "there is no bone \"Hip\"; did you mean \"Hips\""},
+	    {"empty root", Create({"--root", ""}), 2, "", "there is no bone \"\""},
+	});
 }
 
 TEST(Usage, EditsWithUnfitValues)
 {
-	const VScratchFolder folder;
-	RunRows(
-	    {
-	        {"scale 0", Create({"--scale", "0"}), 2, "", "--scale: a scale must be above 0: 0"},
-	        {"scale -1", Create({"--scale", "-1"}), 2, "", "--scale: a scale must be above 0: -1"},
-	        {"scale word", Create({"--scale", "big"}), 2, "", "--scale: \"big\" is not a finite number"},
-	        {"weight", Create({"--position", "Hips:Hips", "--weight", "0=-1"}), 2, "",
-	            "a weight cannot be negative: -1"},
-	        {"weight form", Create({"--position", "Hips:Hips", "--weight", "0"}), 2, "", "\"0\" is not TARGET=WEIGHT"},
-	        {"state count", Create({"--position", "Hips:Hips", "--state", "0=1,2"}), 2, "",
-	            "--state: \"1,2\" is not three numbers"},
-	        {"pose count", Create({"--pose", "LeftArm=1,2"}), 2, "", "the joint of \"LeftArm\" takes 3 numbers, not 2"},
-	        {"pose of the root", Create({"--pose", "Hips=1,2,3,4"}), 2, "", "takes 3 or 6 numbers, not 4"},
-	        {"pose without joint", Create({"--prune-joints", "--pose", "LeftArm=1,2,3"}), 2, "",
-	            "--pose: \"LeftArm\" has no joint that could move"},
-	    },
-	    folder);
+	RunRows({
+	    {"scale 0", Create({"--scale", "0"}), 2, "", "--scale: a scale must be above 0: 0"},
+	    {"scale -1", Create({"--scale", "-1"}), 2, "", "--scale: a scale must be above 0: -1"},
+	    {"scale word", Create({"--scale", "big"}), 2, "", "--scale: \"big\" is not a finite number"},
+	    {"weight", Create({"--position", "Hips:Hips", "--weight", "0=-1"}), 2, "", "a weight cannot be negative: -1"},
+	    {"weight form", Create({"--position", "Hips:Hips", "--weight", "0"}), 2, "", "\"0\" is not TARGET=WEIGHT"},
+	    {"state count", Create({"--position", "Hips:Hips", "--state", "0=1,2"}), 2, "",
+	        "--state: \"1,2\" is not three numbers"},
+	    {"pose count", Create({"--pose", "LeftArm=1,2"}), 2, "", "the joint of \"LeftArm\" takes 3 numbers, not 2"},
+	    {"pose of the root", Create({"--pose", "Hips=1,2,3,4"}), 2, "", "takes 3 or 6 numbers, not 4"},
+	    {"pose without joint", Create({"--prune-joints", "--pose", "LeftArm=1,2,3"}), 2, "",
+	        "--pose: \"LeftArm\" has no joint that could move"},
+	});
 }
 
 TEST(Usage, LevelsOfMessages)
