@@ -1,4 +1,5 @@
-#include "CoreGraphics/CameraController.h"
+#include "CameraChecks.h"
+
 #include "CoreGraphics/InteractionMapper.h"
 
 #include <gtest/gtest.h>
@@ -6,8 +7,11 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
+#include <optional>
 
 using namespace CoreGraphics;
+using GraphicsTest::ExpectNear;
+using GraphicsTest::OnScreen;
 
 namespace
 {
@@ -19,22 +23,6 @@ void ExpectNear(const QVector3D& i_rActual, const QVector3D& i_rExpected, float 
 {
 	for (int axis = 0; axis < 3; ++axis)
 		EXPECT_NEAR(i_rActual[axis], i_rExpected[axis], i_Tolerance) << "axis " << axis;
-}
-
-void ExpectNear(const QMatrix4x4& i_rActual, const QMatrix4x4& i_rExpected, float i_Tolerance)
-{
-	for (int row = 0; row < 4; ++row)
-	{
-		for (int column = 0; column < 4; ++column)
-			EXPECT_NEAR(i_rActual(row, column), i_rExpected(row, column), i_Tolerance) << row << ", " << column;
-	}
-}
-
-/// Pixels from the upper left corner.
-QPointF OnScreen(const VCameraController& i_rCamera, const QVector3D& i_rPoint)
-{
-	const QVector3D place = (i_rCamera.m_Projection * i_rCamera.m_View).map(i_rPoint);
-	return {0.5 * (1.0 + place.x()) * i_rCamera.m_Size.width(), 0.5 * (1.0 - place.y()) * i_rCamera.m_Size.height()};
 }
 
 class CameraController : public testing::Test
@@ -61,19 +49,27 @@ protected:
 
 } // namespace
 
-TEST_F(CameraController, BeginsWithTheWholeStage)
+TEST_F(CameraController, BeginsWithTheWholeStageAndGoesBackToItOrNear)
 {
-	EXPECT_EQ(m_Camera.m_Near, 1.0f);
-	EXPECT_EQ(m_Camera.m_Far, 100000.0f);
-	EXPECT_EQ(m_Camera.m_FieldOfView, 45.0f);
-	EXPECT_EQ(m_Camera.m_Pitch, -60.0f);
-	EXPECT_EQ(m_Camera.m_Yaw, 45.0f);
-	EXPECT_EQ(m_Camera.m_Distance, 7000.0f);
-	EXPECT_EQ(m_Camera.m_OrthographicScale, 4.0f);
-	EXPECT_EQ(m_Camera.m_Centre, QVector3D());
-	EXPECT_TRUE(m_Camera.m_FrameOfReference.isIdentity());
 	EXPECT_EQ(m_Camera.m_Type, ECameraPerspective);
 	EXPECT_FALSE(m_Camera.m_bYUp);
+	for (const std::optional<bool> close : {std::optional<bool>(), {true}, {false}})
+	{
+		if (close)
+		{
+			m_Camera.m_Centre = QVector3D(1, 2, 3);
+			m_Camera.m_OrthographicScale = 9.0f;
+			m_Camera.m_FrameOfReference.translate(1, 2, 3);
+			m_Camera.Reset(*close);
+		}
+		const bool bClose = close.value_or(false);
+		EXPECT_EQ(m_Camera.m_Pitch, bClose ? -90.0f : -60.0f);
+		EXPECT_EQ(m_Camera.m_Yaw, bClose ? 0.0f : 45.0f);
+		EXPECT_EQ(m_Camera.m_Distance, bClose ? 1000.0f : 7000.0f);
+		EXPECT_EQ(m_Camera.m_OrthographicScale, 4.0f);
+		EXPECT_EQ(m_Camera.m_Centre, QVector3D());
+		EXPECT_TRUE(m_Camera.m_FrameOfReference.isIdentity());
+	}
 }
 
 TEST_F(CameraController, PerspectiveLooksFromASphereRoundTheCentre)
@@ -98,7 +94,7 @@ TEST_F(CameraController, PerspectiveLooksFromASphereRoundTheCentre)
 			const QVector3D back = turned(std::sin(y) * std::sin(p), std::cos(y) * std::sin(p), std::cos(p));
 			QMatrix4x4 expected;
 			expected.lookAt(m_Camera.m_Centre + 3000.0f * back, m_Camera.m_Centre, turned(0.0, 0.0, 1.0));
-			ExpectNear(m_Camera.m_View, expected, 2e-3f);
+			ExpectNear(m_Camera.m_View, expected, 2e-3f, 2e-3f);
 		}
 	}
 	// Depth of the near and the far plane, and the edge of the view at half of 45 degrees.
@@ -235,23 +231,6 @@ TEST_F(CameraController, DollyAndWheelStayWithinTheirLimits)
 	m_Camera.Wheel(120);
 	m_Camera.Update();
 	EXPECT_EQ(m_Camera.m_Projection, projection);
-}
-
-TEST_F(CameraController, ResetGoesNearOrFar)
-{
-	for (const bool bClose : {true, false})
-	{
-		m_Camera.m_Centre = QVector3D(1, 2, 3);
-		m_Camera.m_OrthographicScale = 9.0f;
-		m_Camera.m_FrameOfReference.translate(1, 2, 3);
-		m_Camera.Reset(bClose);
-		EXPECT_EQ(m_Camera.m_Pitch, bClose ? -90.0f : -60.0f);
-		EXPECT_EQ(m_Camera.m_Yaw, bClose ? 0.0f : 45.0f);
-		EXPECT_EQ(m_Camera.m_Distance, bClose ? 1000.0f : 7000.0f);
-		EXPECT_EQ(m_Camera.m_OrthographicScale, 4.0f);
-		EXPECT_EQ(m_Camera.m_Centre, QVector3D());
-		EXPECT_TRUE(m_Camera.m_FrameOfReference.isIdentity());
-	}
 }
 
 TEST_F(CameraController, FitFillsTheViewToTheMargin)

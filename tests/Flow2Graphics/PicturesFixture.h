@@ -1,7 +1,9 @@
 #pragma once
 
+#include "../CoreGraphics/CameraChecks.h"
 #include "../OrlexGraphics/SceneFixture.h"
 #include "../PictureTest.h"
+#include "TestSubject.h"
 
 #include "Flow2Graphics/FlowScene.h"
 
@@ -18,6 +20,9 @@ struct VView
 	float m_Scale = 10.0f;
 };
 
+/// Of the small subject.
+inline const VView c_Small{{0, 170, 110}, 460.0f, -65.0f, 60.0f};
+
 /// Frames of the flow scene, without floor and axes unless a test wants them.
 class VPicturesTest : public VSceneTest
 {
@@ -30,6 +35,10 @@ protected:
 		m_pScene = Show<Flow2Graphics::VFlowScene>();
 		Options().m_bFloorGrid = Options().m_bGlobalAxis = false;
 	}
+
+	/// With the arguments of TestSubject::MakeSubjectFrame.
+	void ShowSmall(const auto&... i_rArguments) { m_pScene->SetFrame(TestSubject::MakeSubjectFrame(i_rArguments...)); }
+
 	CoreGraphics::VCameraController& SetView(const VView& i_rView)
 	{
 		CoreGraphics::VCameraController& rCamera = Camera();
@@ -50,6 +59,11 @@ protected:
 		SetView(i_rView);
 		Frame();
 		return m_pTarget->toImage().convertToFormat(QImage::Format_RGB32);
+	}
+
+	std::vector<NVX::ISelectionItem> PickAt(const QVector3D& i_rPlace)
+	{
+		return Pick(GraphicsTest::OnScreen(Camera(), i_rPlace).toPoint());
 	}
 
 	/// Beside the stored one of the dialect: OpenGL ES has no samples, its edges are steps.

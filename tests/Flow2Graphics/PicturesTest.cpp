@@ -24,21 +24,6 @@ using OrlexGraphics::VSubjectOptions;
 class Pictures : public VPicturesTest
 {
 protected:
-	/// The small subject as one of a class.
-	void ShowSmall(const VSubjectTypes& i_rTypes = VFlowSubjectForSolvingTypes::c_Types,
-	    const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr,
-	    const CoreOrlexTypes::VSubjectDynamicParameters& i_rPose = TestSubject::MakePose())
-	{
-		std::vector items{Tagged(i_rTypes.m_Subject, TestSubject::Make()),
-		    Tagged(i_rTypes.m_ApplicationData, TestSubject::MakeData()), Tagged(i_rTypes.m_Pose, i_rPose)};
-		if (i_pLabels)
-			items.push_back(Tagged(i_rTypes.m_Labels, *i_pLabels));
-		if (i_rTypes.m_Settings)
-			items.push_back(Tagged(i_rTypes.m_Settings,
-			    CoreOrlexTypes::VSubjectSettings{TestSubject::c_Id, i_rTypes.m_Class == ESubjectClassProp}));
-		m_pScene->SetFrame(TestSubject::MakeFrame(items));
-	}
-
 	/// Performer and character of the demo, in the poses that their files hold. The files have Z up.
 	void ShowDemo(bool i_bYUp = false)
 	{
@@ -55,13 +40,13 @@ protected:
 			    << i_rPath;
 			CoreOrlexTypes::VSubject subject;
 			CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(parametrised, subject);
-			items.push_back(Tagged(i_rTypes.m_Subject, std::move(subject)));
-			items.push_back(Tagged(i_rTypes.m_ApplicationData, std::move(data)));
+			items.push_back(TestSubject::Item(i_rTypes.m_Subject, std::move(subject)));
+			items.push_back(TestSubject::Item(i_rTypes.m_ApplicationData, std::move(data)));
 			std::vector<double> pose = CoreOrlexTypesUtils::PoseVector(parametrised, i_pStatistic);
 			if (i_bYUp)
 				TurnToYUp(pose);
-			items.push_back(
-			    Tagged(i_rTypes.m_Pose, CoreOrlexTypes::VSubjectDynamicParameters{TestSubject::c_Id, std::move(pose)}));
+			items.push_back(TestSubject::Item(
+			    i_rTypes.m_Pose, CoreOrlexTypes::VSubjectDynamicParameters{TestSubject::c_Id, std::move(pose)}));
 		};
 		using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
 		add(RETARGET_SOURCE "/demo/performer.qrs", VFlowSubjectTypes::c_Types, &VJoint::m_BindPose);
@@ -70,12 +55,6 @@ protected:
 	}
 
 private:
-	template <typename T>
-	static NVX::CountedPointer<TesselPluginInterface::IFlowItem> Tagged(std::uint32_t i_Tag, T i_Value)
-	{
-		return TestSubject::Item(Flow2TypesUtils::FindItemType(i_Tag)->m_Name, std::move(i_Value));
-	}
-
 	/// Rotation vector and translation of a root without a pose of its own before them.
 	static void TurnToYUp(std::vector<double>& io_rPose)
 	{
@@ -103,8 +82,6 @@ VSubjectOptions Only(const std::function<void(VSubjectOptions&)>& i_rSwitchOn)
 	i_rSwitchOn(options);
 	return options;
 }
-
-const VView c_Small{{0, 170, 110}, 460.0f, -65.0f, 60.0f};
 
 TEST_P(Pictures, OfEachThingThatASubjectIsDrawnAs)
 {
@@ -227,7 +204,8 @@ TEST_P(Pictures, OfSourceAndTargetFromEachSide)
 
 TEST_P(Pictures, OfAPlateThatLiesOnTheFloor)
 {
-	ShowSmall(VFlowSubjectForSolvingTypes::c_Types, nullptr, {TestSubject::c_Id, {0, 0, 0.7}});
+	ShowSmall(VFlowSubjectForSolvingTypes::c_Types, nullptr,
+	    CoreOrlexTypes::VSubjectDynamicParameters{TestSubject::c_Id, {0, 0, 0.7}});
 	Options().m_bFloorGrid = true;
 	// Through a telescope: there a step of depth is twice as large as the plate's height over the floor.
 	Camera().m_FieldOfView = 1.3f;
@@ -341,6 +319,7 @@ TEST_P(Pictures, WalkOverWhatDoesNotChange)
 	VSubjectOptions& rOptions = Options().m_SolvingSubject;
 	rOptions.m_bAxes = rOptions.m_bJoints = rOptions.m_bTargets = rOptions.m_bTargetCovariances = true;
 	Options().m_LabellingSubject = rOptions;
+	m_pSelection->Selection().Replace({VSubjectSelectionMaker<VFlowSubjectTypes>().Segment(TestSubject::c_Id, 1)});
 	Draw({{0, 0, 900}, 3000.0f});
 	ExpectThatAFrameIsAWalk();
 }
@@ -351,7 +330,6 @@ TEST_P(Pictures, PicksFindWhatIsSeen)
 	Options().m_SolvingSubject =
 	    Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = o_rOptions.m_bTargets = true; });
 	Draw(c_Small);
-	const CoreGraphics::VCameraController& rCamera = m_Renderer.m_Input.m_Camera;
 	const VSubjectSelectionMaker<VFlowSubjectForSolvingTypes> items;
 	const struct
 	{
@@ -366,13 +344,9 @@ TEST_P(Pictures, PicksFindWhatIsSeen)
 	};
 	for (const auto& rRow : c_Rows)
 	{
-		const QVector3D ndc = (rCamera.m_Projection * rCamera.m_View).map(rRow.m_Place);
-		OrlexGraphics::VPickRequest request;
-		request.m_Mouse = QPoint(int((ndc.x() * 0.5f + 0.5f) * 320.0f), int((0.5f - ndc.y() * 0.5f) * 240.0f));
-		OrlexGraphics::VPick pick;
-		m_Renderer.Pick(request, pick);
-		ASSERT_EQ(pick.m_Items.size(), 1u) << rRow.m_Item.m_Kind << " " << rRow.m_Item.m_ElementIndex;
-		EXPECT_EQ(pick.m_Items[0], rRow.m_Item) << pick.m_Items[0].m_Kind << " " << pick.m_Items[0].m_ElementIndex;
+		const std::vector<NVX::ISelectionItem> picked = PickAt(rRow.m_Place);
+		ASSERT_EQ(picked.size(), 1u) << rRow.m_Item.m_Kind << " " << rRow.m_Item.m_ElementIndex;
+		EXPECT_EQ(picked[0], rRow.m_Item) << picked[0].m_Kind << " " << picked[0].m_ElementIndex;
 	}
 
 	// What is there to be looked at alone is in no rectangle: the plates are.
@@ -381,16 +355,10 @@ TEST_P(Pictures, PicksFindWhatIsSeen)
 	const CoreOrlexTypes::VReconstructionLabelSet labels{{{TestSubject::c_Id, 0, {0, 320, 130}}}};
 	ShowSmall(VFlowSubjectForSolvingTypes::c_Types, &labels);
 	Draw(c_Small);
-	OrlexGraphics::VPickRequest all;
-	all.m_bRectangle = true;
-	all.m_Mouse = QPoint(319, 239);
-	OrlexGraphics::VPick pick;
-	m_Renderer.Pick(all, pick);
-	const auto isPicked = [&](const NVX::ISelectionItem& i_rItem)
-	{ return std::find(pick.m_Items.begin(), pick.m_Items.end(), i_rItem) != pick.m_Items.end(); };
-	EXPECT_EQ(pick.m_Items.size(), 2u);
-	EXPECT_TRUE(isPicked(items.Subject(TestSubject::c_Id)));
-	EXPECT_TRUE(isPicked(items.Segment(TestSubject::c_Id, TestSubject::ELimb)));
+	const std::vector<NVX::ISelectionItem> picked = Pick({319, 239}, QPoint());
+	EXPECT_EQ(picked.size(), 2u);
+	for (const auto& rItem : {items.Subject(TestSubject::c_Id), items.Segment(TestSubject::c_Id, TestSubject::ELimb)})
+		EXPECT_EQ(std::count(picked.begin(), picked.end(), rItem), 1) << rItem.m_Kind;
 }
 
 } // namespace

@@ -19,7 +19,6 @@ namespace
 {
 
 using namespace FbxTest;
-using TestSubject::Item;
 
 /// A box about a place, in one material, that goes with one bone; each face shows the whole texture.
 VTestMesh Box(int i_Node, int i_Bone, const QVector3D& i_rMiddle, VTestMaterial i_Material)
@@ -116,35 +115,18 @@ protected:
 		data.m_Skin = "Boxes";
 		data.m_Targets[TestSubject::EBody].m_Colour = {0, 255, 0, 255};
 		data.m_SkinColourA = data.m_SkinColourB = i_rTint;
-		auto items = std::vector{Item("FlowSubjectForSolving", TestSubject::Make()),
-		    Item("FlowSubjectApplicationDataForSolving", std::move(data)),
-		    Item("FlowSubjectDynamicParametersForSolving", TestSubject::MakePose())};
-		if (i_pLabels)
-			items.push_back(Item("FlowReconstructionLabelSetForSolving", *i_pLabels));
-		m_pScene->SetFrame(TestSubject::MakeFrame(items));
+		ShowSmall(Flow2Graphics::VFlowSubjectForSolvingTypes::c_Types, i_pLabels, TestSubject::MakePose(), data);
 	}
 	/// Until the skin is on.
 	void Wear()
 	{
 		m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {m_Folder.path().toStdString()});
 		m_pDispatcher->RunPending();
-		Draw(c_View);
+		Draw(c_Small);
 		m_pJobs->RunAll();
 		m_pDispatcher->RunPending();
 	}
-	std::vector<NVX::ISelectionItem> PickAt(const QVector3D& i_rPlace)
-	{
-		Draw(c_View);
-		const CoreGraphics::VCameraController& rCamera = m_Renderer.m_Input.m_Camera;
-		const QVector3D ndc = (rCamera.m_Projection * rCamera.m_View).map(i_rPlace);
-		OrlexGraphics::VPickRequest request;
-		request.m_Mouse = QPoint(int((ndc.x() * 0.5f + 0.5f) * 320.0f), int((0.5f - ndc.y() * 0.5f) * 240.0f));
-		OrlexGraphics::VPick pick;
-		m_Renderer.Pick(request, pick);
-		return pick.m_Items;
-	}
 
-	static constexpr VView c_View{{0, 170, 110}, 460.0f, -65.0f, 60.0f};
 	const QTemporaryDir m_Folder;
 	const std::shared_ptr<VHeldJobs> m_pJobs = std::make_shared<VHeldJobs>();
 };
@@ -153,39 +135,39 @@ INSTANTIATE_IN_BOTH_DIALECTS(SkinPictures);
 TEST_P(SkinPictures, OfMaterialsOpaqueAndAsXRay)
 {
 	Show();
-	const QImage bare = Draw(c_View);
+	const QImage bare = Draw(c_Small);
 	Wear();
-	Compare(Draw(c_View), "skin");
+	Compare(Draw(c_Small), "skin");
 	Options().m_SolvingSubject.m_bSkinXRay = true;
-	Compare(Draw(c_View), "skin-xray");
+	Compare(Draw(c_Small), "skin-xray");
 	Options().m_SolvingSubject.m_bSkin = false;
-	EXPECT_EQ(Draw(c_View), bare);
+	EXPECT_EQ(Draw(c_Small), bare);
 	Options().m_SolvingSubject.m_bSkinXRay = false;
 	Options().m_SolvingSubject.m_bSkin = true;
 	Show(nullptr, {0, 255, 255, 128});
-	Compare(Draw(c_View), "skin-tinted");
+	Compare(Draw(c_Small), "skin-tinted");
 	// The limb's marker is missing.
 	const CoreOrlexTypes::VReconstructionLabelSet labels{
 	    {{TestSubject::c_Id, 1, {0, 320, 130}}, {TestSubject::c_Id, 2, {10, 360, 190}}}};
 	Show(&labels);
 	Options().m_SolvingSubject.m_bMissingMarkers = true;
-	Compare(Draw(c_View), "skin-health");
+	Compare(Draw(c_Small), "skin-health");
 }
 
 TEST_P(SkinPictures, OfTheClustersOfASubject)
 {
 	Show();
 	Wear();
-	const QImage without = Draw(c_View);
+	const QImage without = Draw(c_Small);
 	VTestScene scene;
 	AddNode(scene, "beacon", "LimbNode", -1, {0, 0, 0});
 	AddNode(scene, "mesh", "Mesh", -1, {0, 0, 0});
 	WriteFile("OrlexBeacon", scene, {Box(1, 0, {0, 0, 0}, {"phong", {}, "", ""})});
 	m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {});
 	Wear();
-	Compare(Draw(c_View), "skin-cluster");
+	Compare(Draw(c_Small), "skin-cluster");
 	Options().m_SolvingSubject.m_bClusters = false;
-	EXPECT_EQ(Draw(c_View), without);
+	EXPECT_EQ(Draw(c_Small), without);
 }
 
 TEST_P(SkinPictures, OfAFileAsItStands)
@@ -206,13 +188,13 @@ TEST_P(SkinPictures, ChangeWithTheFileAndNotBeforeItIsRead)
 {
 	Show();
 	Wear();
-	const QImage red = Draw(c_View);
+	const QImage red = Draw(c_Small);
 	WriteBoxes({0, 1, 0});
 	m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {"/", m_Folder.path().toStdString()});
 	m_pDispatcher->RunPending();
-	EXPECT_EQ(Draw(c_View), red) << "worn until the new one is there";
+	EXPECT_EQ(Draw(c_Small), red) << "worn until the new one is there";
 	m_pJobs->RunAll();
-	EXPECT_NE(Draw(c_View), red);
+	EXPECT_NE(Draw(c_Small), red);
 }
 
 TEST_P(SkinPictures, ArePickedAsTheSubjectUnlessTheyAreSeenThrough)
@@ -222,8 +204,10 @@ TEST_P(SkinPictures, ArePickedAsTheSubjectUnlessTheyAreSeenThrough)
 	Options().m_SolvingSubject.m_bBones = true;
 	const Flow2Graphics::VSubjectSelectionMaker<Flow2Graphics::VFlowSubjectForSolvingTypes> items;
 	const QVector3D skinOverBone(10, 22, 100);
+	Draw(c_Small);
 	EXPECT_EQ(PickAt(skinOverBone), std::vector{items.Subject(TestSubject::c_Id)});
 	Options().m_SolvingSubject.m_bSkinXRay = true;
+	Draw(c_Small);
 	EXPECT_EQ(PickAt(skinOverBone), std::vector{items.Segment(TestSubject::c_Id, TestSubject::ERoot)});
 }
 
@@ -235,7 +219,7 @@ TEST_P(SkinPictures, WalkOverWhatDoesNotChange)
 	{
 		Options().m_SolvingSubject.m_bSkinXRay = bXRay;
 		SCOPED_TRACE(bXRay);
-		Draw(c_View);
+		Draw(c_Small);
 		ExpectThatAFrameIsAWalk();
 	}
 }

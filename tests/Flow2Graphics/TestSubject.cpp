@@ -91,4 +91,18 @@ NVX::CountedPointer<TesselPluginInterface::IFlowFrame> MakeFrame(
 	return pFrame;
 }
 
+NVX::CountedPointer<TesselPluginInterface::IFlowFrame> MakeSubjectFrame(const Flow2Graphics::VSubjectTypes& i_rTypes,
+    const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels, const CoreOrlexTypes::VSubjectDynamicParameters& i_rPose,
+    const VSubjectApplicationData& i_rData)
+{
+	std::vector items{
+	    Item(i_rTypes.m_Subject, Make()), Item(i_rTypes.m_ApplicationData, i_rData), Item(i_rTypes.m_Pose, i_rPose)};
+	if (i_pLabels)
+		items.push_back(Item(i_rTypes.m_Labels, *i_pLabels));
+	if (i_rTypes.m_Settings)
+		items.push_back(Item(i_rTypes.m_Settings,
+		    CoreOrlexTypes::VSubjectSettings{c_Id, i_rTypes.m_Class == Flow2Graphics::ESubjectClassProp}));
+	return MakeFrame(items);
+}
+
 } // namespace TestSubject

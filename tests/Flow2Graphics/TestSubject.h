@@ -3,6 +3,8 @@
 #include "CoreOrlexTypes/Subject.h"
 #include "CoreOrlexTypes/SubjectApplicationData.h"
 #include "CoreOrlexTypes/SubjectState.h"
+#include "Flow2Graphics/SubjectTypes.h"
+#include "Flow2TypesUtils/ItemCatalogue.h"
 #include "InMemoryHost/Flow.h"
 
 #include <memory>
@@ -52,5 +54,19 @@ NVX::CountedPointer<TesselPluginInterface::IFlowItem> Item(const std::string& i_
 
 NVX::CountedPointer<TesselPluginInterface::IFlowFrame> MakeFrame(
     const std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>>& i_rItems);
+
+/// An item of a number.
+template <typename T>
+NVX::CountedPointer<TesselPluginInterface::IFlowItem> Item(std::uint32_t i_Tag, T i_Value)
+{
+	return Item(Flow2TypesUtils::FindItemType(i_Tag)->m_Name, std::move(i_Value));
+}
+
+/// The small subject as one of a class.
+NVX::CountedPointer<TesselPluginInterface::IFlowFrame> MakeSubjectFrame(
+    const Flow2Graphics::VSubjectTypes& i_rTypes = Flow2Graphics::VFlowSubjectForSolvingTypes::c_Types,
+    const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels = nullptr,
+    const CoreOrlexTypes::VSubjectDynamicParameters& i_rPose = MakePose(),
+    const CoreOrlexTypes::VSubjectApplicationData& i_rData = MakeData());
 
 } // namespace TestSubject

@@ -5,14 +5,12 @@
 #include "TestSubject.h"
 
 #include <QQmlComponent>
-#include <QQmlPropertyMap>
 #include <QQuickItem>
 
 namespace
 {
 
 using namespace Flow2Graphics;
-using TestSubject::Item;
 
 /// Where the cameras of a stage stand no item tells yet.
 class VStageScene : public VFlowScene
@@ -41,16 +39,13 @@ protected:
 		rCamera.m_Distance = 700.0f;
 		rCamera.m_Pitch = -65.0f;
 		rCamera.m_Yaw = 60.0f;
-		m_pView->GetSceneOptions()->insert("FloorGrid", i_bFloor);
-		m_pView->OnSceneOptionsMapChanged("FloorGrid", i_bFloor);
+		SetOption("FloorGrid", i_bFloor);
 		Pose(TestSubject::MakePose());
 	}
 
 	void Pose(const CoreOrlexTypes::VSubjectDynamicParameters& i_rPose)
 	{
-		m_pStage->SetFrame(TestSubject::MakeFrame({Item("FlowSubjectForSolving", TestSubject::Make()),
-		    Item("FlowSubjectApplicationDataForSolving", TestSubject::MakeData()),
-		    Item("FlowSubjectDynamicParametersForSolving", i_rPose)}));
+		m_pStage->SetFrame(TestSubject::MakeSubjectFrame(VFlowSubjectForSolvingTypes::c_Types, nullptr, i_rPose));
 	}
 
 	/// What was asked for is drawn, and what that led to is drawn as well.

@@ -5,7 +5,8 @@
 
 #include <QOpenGLFramebufferObject>
 
-#include <future>
+#include <atomic>
+#include <semaphore>
 #include <thread>
 
 namespace
@@ -38,10 +39,8 @@ protected:
 	void Frame(bool i_bLast = false)
 	{
 		m_bLast = i_bLast;
-		std::promise<void> exchanged;
-		auto done = exchanged.get_future();
-		m_Wanted.Push(std::move(exchanged));
-		done.wait();
+		m_Wanted.release();
+		m_Exchanged.acquire();
 	}
 
 	/// From the last frame that was drawn.
@@ -57,31 +56,6 @@ protected:
 	CoreGraphics::VCameraController m_Camera;
 
 private:
-	/// One at a time.
-	class VRequests
-	{
-	public:
-		void Push(std::promise<void> i_Request)
-		{
-			const std::lock_guard lock(m_Mutex);
-			m_Request = std::move(i_Request);
-			m_Condition.notify_one();
-		}
-		std::promise<void> Pop()
-		{
-			std::unique_lock lock(m_Mutex);
-			m_Condition.wait(lock, [&] { return m_Request.has_value(); });
-			std::promise<void> request = std::move(*m_Request);
-			m_Request.reset();
-			return request;
-		}
-
-	private:
-		std::mutex m_Mutex;
-		std::condition_variable m_Condition;
-		std::optional<std::promise<void>> m_Request;
-	};
-
 	void Run()
 	{
 		QOpenGLContext context;
@@ -96,14 +70,14 @@ private:
 		OrlexGraphics::VPick pick;
 		for (bool bLast = false; !bLast;)
 		{
-			std::promise<void> exchanged = m_Wanted.Pop();
+			m_Wanted.acquire();
 			bLast = m_bLast;
 			if (!renderer.Scene())
 				renderer.SetScene(m_pScene);
 			m_pScene->Synchronise();
 			renderer.m_Input.m_Options = m_Options;
 			renderer.m_Input.m_Camera = m_Camera;
-			exchanged.set_value();
+			m_Exchanged.release();
 
 			renderer.Update();
 			renderer.Pick(request, pick);
@@ -114,7 +88,8 @@ private:
 	}
 
 	QOffscreenSurface m_Surface;
-	VRequests m_Wanted;
+	std::binary_semaphore m_Wanted{0};
+	std::binary_semaphore m_Exchanged{0};
 	bool m_bLast = false;
 	std::atomic<std::size_t> m_FoundCount = 0;
 	std::thread m_Render;

@@ -15,8 +15,6 @@ namespace
 {
 
 using OrlexGraphics::VFrameRenderer;
-using OrlexGraphics::VPick;
-using OrlexGraphics::VPickRequest;
 
 /// Spheres, all of one radius in pixels, beside the boxes.
 class VSpheres : public OrlexGraphics::IRenderType
@@ -90,16 +88,11 @@ protected:
 		Camera().SetSize(m_Size);
 	}
 
-	std::vector<std::uint32_t> Pick(const QPoint& i_rMouse, std::optional<QPoint> i_Start = {})
+	/// By element index.
+	std::vector<std::uint32_t> Picked(const QPoint& i_rMouse, const std::optional<QPoint>& i_rStart = {})
 	{
-		VPickRequest request;
-		request.m_Mouse = i_rMouse;
-		request.m_bRectangle = i_Start.has_value();
-		request.m_Start = i_Start.value_or(QPoint());
-		VPick pick;
-		m_Renderer.Pick(request, pick);
 		std::vector<std::uint32_t> indices;
-		for (const NVX::ISelectionItem& rItem : pick.m_Items)
+		for (const NVX::ISelectionItem& rItem : Pick(i_rMouse, i_rStart))
 			indices.push_back(rItem.m_ElementIndex);
 		return indices;
 	}
@@ -111,7 +104,8 @@ INSTANTIATE_IN_BOTH_DIALECTS(Offscreen);
 
 TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
 {
-	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}, {Item(3), {100, 103, 1, 1}},
+	    {Item(4), {100, 97, 1, 1}}, {Item(5), {50, 136, 1, 1}}};
 	m_pSelection->Selection().Replace({Item(1)});
 	Frame();
 	// Samples and channels of what is drawn into.
@@ -128,9 +122,11 @@ TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
 	EXPECT_EQ(image.pixel(40, 40), 0xff4040ffu);
 	EXPECT_EQ(image.pixel(120, 40), 0xff0000ffu);
 	EXPECT_EQ(image.pixel(190, 150), 0xff202020u);
-	EXPECT_EQ(Pick({120, 40}), std::vector<std::uint32_t>{2});
-	EXPECT_EQ(Pick({80, 120}), std::vector<std::uint32_t>{});
-	EXPECT_EQ(Pick({10, 10}, QPoint(150, 100)), (std::vector<std::uint32_t>{1, 2}));
+	EXPECT_EQ(Picked({120, 40}), std::vector<std::uint32_t>{2});
+	EXPECT_EQ(Picked({80, 120}), std::vector<std::uint32_t>{});
+	EXPECT_EQ(Picked({100, 100}), std::vector<std::uint32_t>{3}) << "of equally far ones the first row from the bottom";
+	EXPECT_EQ(Picked({50, 130}), std::vector<std::uint32_t>{}) << "six pixels are too far";
+	EXPECT_EQ(Picked({10, 10}, QPoint(150, 90)), (std::vector<std::uint32_t>{1, 2}));
 }
 
 TEST_P(Offscreen, PicksRectanglesExactlyOrThroughLayers)
@@ -162,7 +158,7 @@ TEST_P(Offscreen, PicksRectanglesExactlyOrThroughLayers)
 			for (const bool bExact : {false, true})
 			{
 				m_pScene->m_bExactPick = bExact;
-				EXPECT_EQ(Pick(rRow.m_B, rRow.m_A), bExact ? rRow.m_Exact : rRow.m_Layers)
+				EXPECT_EQ(Picked(rRow.m_B, rRow.m_A), bExact ? rRow.m_Exact : rRow.m_Layers)
 				    << rRow.m_pName << (bExact ? ", exactly" : ", through layers");
 			}
 	}
@@ -189,9 +185,9 @@ TEST_P(Offscreen, DrawsSpheresByTheirSizeOnScreen)
 	EXPECT_NEAR(lit(4), 254, 40) << "the disc";
 
 	for (std::uint32_t i = 1; i < 5; ++i)
-		EXPECT_EQ(Pick({20 + 20 * static_cast<int>(i), 120}), std::vector<std::uint32_t>{100 + i}) << i;
-	EXPECT_EQ(Pick({0, 100}, QPoint(199, 140)).size(), 5u);
-	EXPECT_EQ(Pick({50, 100}, QPoint(70, 140)), std::vector<std::uint32_t>{102});
+		EXPECT_EQ(Picked({20 + 20 * static_cast<int>(i), 120}), std::vector<std::uint32_t>{100 + i}) << i;
+	EXPECT_EQ(Picked({0, 100}, QPoint(199, 140)).size(), 5u);
+	EXPECT_EQ(Picked({50, 100}, QPoint(70, 140)), std::vector<std::uint32_t>{102});
 }
 
 TEST(SphereHelper, ChoosesTheMeshByTheEdgesOnScreen)
@@ -207,16 +203,6 @@ TEST(SphereHelper, ChoosesTheMeshByTheEdgesOnScreen)
 	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(1e6f, 1), 1);
 	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(1e6f, 9), 3);
 	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(-1.0f, 3), -1);
-}
-
-TEST_P(Offscreen, WalksOverWhatDoesNotChange)
-{
-	for (std::uint32_t i = 0; i < 40; ++i)
-		m_pScene->m_Next.m_Boxes.push_back({Item(i), QRectF(4 * i, 20, 3, 3)});
-	m_pScene->m_Radii = {0.5f, 1.0f, 3.0f, 9.0f};
-	m_pSelection->Selection().Replace({Item(1), Item(2)});
-	Frame();
-	ExpectThatAFrameIsAWalk();
 }
 
 TEST_P(Offscreen, GoesOnInAContextThatSharesNothing)

@@ -14,6 +14,8 @@
 #include <cstdint>
 #include <cstring>
 #include <memory>
+#include <string>
+#include <utility>
 #include <vector>
 
 /// One render type, drawn without a scene.
@@ -34,7 +36,8 @@ protected:
 
 	/// One pass over a background, which is black for ids.
 	/// @return whether anything was drawn
-	bool DrawPass(OrlexGraphics::IRenderType& io_rType, std::uint32_t i_Mode, std::uint32_t i_Pass)
+	bool Draw(
+	    OrlexGraphics::IRenderType& io_rType, std::uint32_t i_Pass, std::uint32_t i_Mode = CoreGraphics::ERenderNormal)
 	{
 		m_Camera.Update();
 		m_Camera.Apply(m_Render);
@@ -47,6 +50,34 @@ protected:
 		EXPECT_EQ(m_Render.m_Viewport, QRect(QPoint(), m_Size));
 		// Each pixel is like the one before it.
 		return std::memcmp(m_Pixels.data(), m_Pixels.data() + 4, m_Pixels.size() - 4) != 0;
+	}
+
+	/// The exchange before a frame update, and what of that is the manipulator's.
+	template <typename TManipulator>
+	void Update(TManipulator& io_rManipulator)
+	{
+		io_rManipulator.Synchronise();
+		BeginFrame();
+		io_rManipulator.AllocateIds();
+	}
+	template <typename TManipulator>
+	void DrawFrame(TManipulator& io_rManipulator, std::uint32_t i_Mode = CoreGraphics::ERenderNormal)
+	{
+		Update(io_rManipulator);
+		Draw(io_rManipulator, OrlexGraphics::EPassOverlay, i_Mode);
+	}
+
+	/// Where it draws: the pass, and the mode where that is not the normal one.
+	std::string DrawnIn(OrlexGraphics::IRenderType& io_rType)
+	{
+		std::string drawn;
+		for (const auto& [mode, pMode] : {std::pair(CoreGraphics::ERenderNormal, ""),
+		         {CoreGraphics::ERenderPick, " pick"}, {CoreGraphics::ERenderId, " id"}})
+			for (const auto& [pass, pPass] : {std::pair(OrlexGraphics::EPassOpaque, "opaque"),
+			         {OrlexGraphics::EPassTransparent, "transparent"}, {OrlexGraphics::EPassOverlay, "overlay"}})
+				if (Draw(io_rType, pass, mode))
+					drawn += (drawn.empty() ? "" : ", ") + std::string(pPass) + pMode;
+		return drawn;
 	}
 
 	void Read() { m_Render.ReadPixels(QRect(QPoint(), m_Size), m_Pixels); }
@@ -72,6 +103,22 @@ protected:
 			}
 		}
 		return extent;
+	}
+
+	/// What is not background, from the lower left corner.
+	QRect Drawn() const
+	{
+		const VColour background{m_Background.red(), m_Background.green(), m_Background.blue()};
+		return Extent([&](const VColour& i_rPixel) { return i_rPixel != background; });
+	}
+
+	/// Edges that lie between two pixels may fall to either.
+	static void ExpectNear(const QRect& i_rActual, const QRect& i_rExpected, double i_Tolerance = 1.0)
+	{
+		EXPECT_NEAR(i_rActual.left(), i_rExpected.left(), i_Tolerance);
+		EXPECT_NEAR(i_rActual.right(), i_rExpected.right(), i_Tolerance);
+		EXPECT_NEAR(i_rActual.top(), i_rExpected.top(), i_Tolerance);
+		EXPECT_NEAR(i_rActual.bottom(), i_rExpected.bottom(), i_Tolerance);
 	}
 
 	NVX::ISelectionItem ItemAt(int i_X, int i_Y) const

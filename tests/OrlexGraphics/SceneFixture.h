@@ -13,6 +13,8 @@
 #include <QOpenGLFramebufferObject>
 
 #include <memory>
+#include <optional>
+#include <vector>
 
 /// Frames of a scene, drawn without a window.
 class VSceneTest : public GraphicsTest::InBothDialects
@@ -41,6 +43,18 @@ protected:
 		m_Renderer.Scene()->Synchronise();
 		m_Renderer.Update();
 		m_Renderer.Render(*m_pTarget);
+	}
+
+	/// In the frame that was drawn last, at a point or in a rectangle from there to the start.
+	std::vector<NVX::ISelectionItem> Pick(const QPoint& i_rMouse, const std::optional<QPoint>& i_rStart = {})
+	{
+		OrlexGraphics::VPickRequest request;
+		request.m_Mouse = i_rMouse;
+		request.m_bRectangle = i_rStart.has_value();
+		request.m_Start = i_rStart.value_or(QPoint());
+		OrlexGraphics::VPick pick;
+		m_Renderer.Pick(request, pick);
+		return pick.m_Items;
 	}
 
 	/// The frame that was drawn last, once more: it takes no memory, asks OpenGL for nothing and looks up no name. The

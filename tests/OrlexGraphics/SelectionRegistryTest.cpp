@@ -76,6 +76,7 @@ TEST(SelectionRegistry, EndsWithItsIds)
 	ISelectionItem item;
 	ASSERT_TRUE(registry.ResolveId(0x1fffff, item));
 	EXPECT_EQ(item, Segment(1));
+	EXPECT_EQ(registry.GetId(Segment(1)).m_Green, 1.0f);
 }
 
 TEST(SelectionRegistry, MarksWhatIsSelected)

@@ -8,6 +8,7 @@
 
 #include <QMouseEvent>
 #include <QOpenGLFunctions>
+#include <QQmlPropertyMap>
 #include <QQuickItem>
 #include <QQuickWindow>
 #include <QTest>
@@ -215,6 +216,12 @@ QRgb VViewTest::Pixel(int i_X, int i_Y)
 	const QPoint pixel(static_cast<int>(i_X * ratio), static_cast<int>(i_Y * ratio));
 	// A window that is being resized may not be so large yet.
 	return image.valid(pixel) ? image.pixel(pixel) : 0;
+}
+
+void VViewTest::SetOption(const char* i_pKey, const QVariant& i_rValue)
+{
+	m_pView->GetSceneOptions()->insert(i_pKey, i_rValue);
+	m_pView->OnSceneOptionsMapChanged(i_pKey, i_rValue);
 }
 
 void VViewTest::Leave()

@@ -104,6 +104,8 @@ protected:
 	QImage Grab();
 	/// Of what is shown now, by item pixels.
 	QRgb Pixel(int i_X, int i_Y);
+	/// As QML does it.
+	void SetOption(const char* i_pKey, const QVariant& i_rValue);
 	void Leave();
 	void Resize(int i_Width, int i_Height);
 	void SetVisible(bool i_bVisible);
