@@ -6,8 +6,10 @@
 #include "TestSubject.h"
 
 #include "Flow2Graphics/FlowScene.h"
+#include "OrlexGraphics/SceneOptionsMap.h"
 
 #include <QImage>
+#include <QQmlPropertyMap>
 
 struct VView
 {
@@ -52,6 +54,17 @@ protected:
 		rCamera.SetSize(m_Size);
 		rCamera.Update();
 		return rCamera;
+	}
+
+	/// As QML does it: of the options of a class, these alone.
+	void ShowOnly(const QString& i_rClass, const QStringList& i_rOptions)
+	{
+		QQmlPropertyMap map;
+		OrlexGraphics::WriteOptionsToMap(Options(), map);
+		for (const QString& rKey : map.keys())
+			if (rKey.startsWith(i_rClass + '-'))
+				map.insert(rKey, i_rOptions.contains(rKey.mid(i_rClass.size() + 1)));
+		EXPECT_TRUE(OrlexGraphics::ReadOptionsFromMap(map, Options()));
 	}
 
 	QImage Draw(const VView& i_rView)

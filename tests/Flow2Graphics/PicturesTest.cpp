@@ -13,13 +13,10 @@
 #include <QQuaternion>
 #include <QtMath>
 
-#include <functional>
-
 namespace
 {
 
 using namespace Flow2Graphics;
-using OrlexGraphics::VSubjectOptions;
 
 class Pictures : public VPicturesTest
 {
@@ -75,65 +72,51 @@ private:
 };
 INSTANTIATE_IN_BOTH_DIALECTS(Pictures);
 
-VSubjectOptions Only(const std::function<void(VSubjectOptions&)>& i_rSwitchOn)
-{
-	VSubjectOptions options;
-	options.m_bBones = options.m_bMarkers = options.m_bSticks = options.m_bMissingMarkers = options.m_bSkin = false;
-	i_rSwitchOn(options);
-	return options;
-}
-
 TEST_P(Pictures, OfEachThingThatASubjectIsDrawnAs)
 {
 	const struct
 	{
 		const char* m_pName;
-		std::function<void(VSubjectOptions&)> m_SwitchOn;
+		QStringList m_Options;
 	} c_Rows[] = {
-	    {"origins", [](VSubjectOptions&) {}},
+	    {"origins", {}},
 	    // They show in any case.
-	    {"origins", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bOrigins = false; }},
-	    {"bones", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; }},
-	    {"joints", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bJoints = true; }},
-	    {"axes", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bAxes = true; }},
-	    {"targets", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bTargets = true; }},
-	    {"covariances", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bTargetCovariances = true; }},
-	    {"markers", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bMarkers = true; }},
-	    {"sticks", [](VSubjectOptions& o_rOptions) { o_rOptions.m_bSticks = o_rOptions.m_bMarkers = true; }},
+	    {"origins", {"Origins"}},
+	    {"bones", {"Bones"}},
+	    {"joints", {"Joints"}},
+	    {"axes", {"Axes"}},
+	    {"targets", {"Targets"}},
+	    {"covariances", {"TargetCovariances"}},
+	    {"markers", {"Markers"}},
+	    {"sticks", {"Sticks", "Markers"}},
 	};
 	ShowSmall();
-	Options().m_LabellingSubject.m_bEnabled = false;
+	ShowOnly("LabellingSubject", {});
 	for (const auto& rRow : c_Rows)
 	{
-		Options().m_SolvingSubject = Only(rRow.m_SwitchOn);
+		ShowOnly("SolvingSubject", rRow.m_Options + QStringList("Enabled"));
 		Compare(Draw(c_Small), rRow.m_pName);
 	}
-	// Nothing of it is drawn when it is switched off.
-	Options().m_SolvingSubject = VSubjectOptions();
-	Options().m_SolvingSubject.m_bEnabled = false;
-	const QImage nothing = Draw(c_Small);
-	for (int y = 0; y < nothing.height(); ++y)
-		for (int x = 0; x < nothing.width(); ++x)
-			ASSERT_EQ(nothing.pixel(x, y), 0xff202020u) << x << " " << y;
+	ShowOnly("SolvingSubject", {"Bones", "Markers"});
+	QImage background(m_Size, QImage::Format_RGB32);
+	background.fill(0xff202020u);
+	EXPECT_EQ(Draw(c_Small), background) << "it is not enabled";
 }
 
 TEST_P(Pictures, OfEachClassUnderItsOptions)
 {
-	using OrlexGraphics::VSceneOptions;
-	VSubjectOptions VSceneOptions::*const c_Options[ESubjectClassCount] = {&VSceneOptions::m_PropSubject,
-	    &VSceneOptions::m_LabellingSubject, &VSceneOptions::m_PropSubject, &VSceneOptions::m_SolvingSubject,
-	    &VSceneOptions::m_RetargetingSubject};
+	const char* const c_Classes[ESubjectClassCount] = {
+	    "PropSubject", "LabellingSubject", "PropSubject", "SolvingSubject", "RetargetingSubject"};
 	for (const VSubjectTypes& rTypes : c_SubjectTypes)
 	{
 		SCOPED_TRACE(rTypes.m_Class);
 		ShowSmall(rTypes);
-		for (const auto pOptions : c_Options)
-			Options().*pOptions = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bEnabled = false; });
-		VSubjectOptions& rOptions = Options().*c_Options[rTypes.m_Class];
-		rOptions = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; });
+		for (const char* const pClass : c_Classes)
+			ShowOnly(pClass, {});
+		ShowOnly(c_Classes[rTypes.m_Class], {"Enabled", "Bones"});
 		Compare(Draw(c_Small), "bones");
 		// Those for retargeting have no markers.
-		rOptions = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bMarkers = true; });
+		ShowOnly(c_Classes[rTypes.m_Class], {"Enabled", "Markers"});
 		Compare(Draw(c_Small), rTypes.m_Class == ESubjectClassRetargeting ? "origins" : "markers");
 	}
 }
@@ -143,27 +126,19 @@ TEST_P(Pictures, OfMissingMarkers)
 	const CoreOrlexTypes::VReconstructionLabelSet labels{
 	    {{TestSubject::c_Id, 0, {0, 320, 130}}, {TestSubject::c_Id, 1, {10, 360, 190}}}};
 	ShowSmall(VFlowSubjectForSolvingTypes::c_Types, &labels);
-	const auto options = [](bool i_bGaps)
-	{
-		return Only(
-		    [i_bGaps](VSubjectOptions& o_rOptions)
-		    {
-			    o_rOptions.m_bMissingMarkers = o_rOptions.m_bMarkers = o_rOptions.m_bSticks = true;
-			    o_rOptions.m_bSticksDuringGaps = i_bGaps;
-		    });
-	};
 	const VView near{{0, 320, 160}, 260.0f, -65.0f, 60.0f};
-	Options().m_SolvingSubject = options(false);
+	const QStringList options{"Enabled", "MissingMarkers", "Markers", "Sticks"};
+	ShowOnly("SolvingSubject", options);
 	Compare(Draw(near), "missing-markers");
-	Options().m_SolvingSubject = options(true);
+	ShowOnly("SolvingSubject", options + QStringList("SticksDuringGaps"));
 	Compare(Draw(near), "sticks-during-gaps");
 }
 
 TEST_P(Pictures, OfTranslucentBonesBesideASource)
 {
 	ShowSmall();
-	const auto bones = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; });
-	Options().m_SolvingSubject = Options().m_LabellingSubject = bones;
+	for (const char* const pClass : {"SolvingSubject", "LabellingSubject"})
+		ShowOnly(pClass, {"Enabled", "Bones"});
 	const QImage dual = Draw(c_Small);
 	Compare(dual, "bones-translucent");
 	Options().m_LabellingSubject.m_bBones = false;
@@ -219,8 +194,7 @@ TEST_P(Pictures, OfAPlateThatLiesOnTheFloor)
 TEST_P(Pictures, OfOutlines)
 {
 	ShowSmall();
-	Options().m_SolvingSubject = Only(
-	    [](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = o_rOptions.m_bTargets = o_rOptions.m_bJoints = true; });
+	ShowOnly("SolvingSubject", {"Enabled", "Bones", "Targets", "Joints"});
 	const VSubjectSelectionMaker<VFlowSubjectForSolvingTypes> items;
 	const auto segment = [&](std::uint32_t i_Index) { return items.Segment(TestSubject::c_Id, i_Index); };
 	const NVX::ISelectionItem root = segment(TestSubject::ERoot), spine = segment(TestSubject::ESpine),
@@ -279,7 +253,7 @@ TEST_P(Pictures, OfTheManipulator)
 	    {"manipulator-small", 7, {}, {}, CoreGraphics::ECameraPerspective, 0.4f},
 	};
 	ShowSmall();
-	Options().m_SolvingSubject = Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = true; });
+	ShowOnly("SolvingSubject", {"Enabled", "Bones"});
 	VRenderManipulator& rManipulator = *m_pScene->RenderManipulator();
 	QMatrix4x4 transform;
 	transform.translate(10, 170, 130);
@@ -316,7 +290,7 @@ TEST_P(Pictures, OfTheManipulator)
 TEST_P(Pictures, WalkOverWhatDoesNotChange)
 {
 	ASSERT_NO_FATAL_FAILURE(ShowDemo());
-	VSubjectOptions& rOptions = Options().m_SolvingSubject;
+	OrlexGraphics::VSubjectOptions& rOptions = Options().m_SolvingSubject;
 	rOptions.m_bAxes = rOptions.m_bJoints = rOptions.m_bTargets = rOptions.m_bTargetCovariances = true;
 	Options().m_LabellingSubject = rOptions;
 	m_pSelection->Selection().Replace({VSubjectSelectionMaker<VFlowSubjectTypes>().Segment(TestSubject::c_Id, 1)});
@@ -327,8 +301,7 @@ TEST_P(Pictures, WalkOverWhatDoesNotChange)
 TEST_P(Pictures, PicksFindWhatIsSeen)
 {
 	ShowSmall();
-	Options().m_SolvingSubject =
-	    Only([](VSubjectOptions& o_rOptions) { o_rOptions.m_bBones = o_rOptions.m_bTargets = true; });
+	ShowOnly("SolvingSubject", {"Enabled", "Bones", "Targets"});
 	Draw(c_Small);
 	const VSubjectSelectionMaker<VFlowSubjectForSolvingTypes> items;
 	const struct
@@ -350,8 +323,7 @@ TEST_P(Pictures, PicksFindWhatIsSeen)
 	}
 
 	// What is there to be looked at alone is in no rectangle: the plates are.
-	Options().m_SolvingSubject = Only([](VSubjectOptions& o_rOptions)
-	    { o_rOptions.m_bAxes = o_rOptions.m_bTargetCovariances = o_rOptions.m_bMissingMarkers = true; });
+	ShowOnly("SolvingSubject", {"Enabled", "Axes", "TargetCovariances", "MissingMarkers"});
 	const CoreOrlexTypes::VReconstructionLabelSet labels{{{TestSubject::c_Id, 0, {0, 320, 130}}}};
 	ShowSmall(VFlowSubjectForSolvingTypes::c_Types, &labels);
 	Draw(c_Small);

@@ -64,9 +64,8 @@ protected:
 	{
 		m_pSkinCache = NVX::MakeShared<OrlexGraphics::VSkinCache>(m_pDispatcher, m_pJobs);
 		ASSERT_NO_FATAL_FAILURE(VPicturesTest::SetUp());
-		Options().m_LabellingSubject.m_bEnabled = false;
-		OrlexGraphics::VSubjectOptions& rOptions = Options().m_SolvingSubject;
-		rOptions.m_bMarkers = rOptions.m_bSticks = rOptions.m_bMissingMarkers = rOptions.m_bBones = false;
+		ShowOnly("LabellingSubject", {});
+		ShowOnly("SolvingSubject", {"Enabled", "Skin", "Clusters"});
 		WriteBoxes({1, 0, 0});
 	}
 	void TearDown() override { m_pSkinCache->Dispose(); }
@@ -138,12 +137,11 @@ TEST_P(SkinPictures, OfMaterialsOpaqueAndAsXRay)
 	const QImage bare = Draw(c_Small);
 	Wear();
 	Compare(Draw(c_Small), "skin");
-	Options().m_SolvingSubject.m_bSkinXRay = true;
+	ShowOnly("SolvingSubject", {"Enabled", "Skin", "SkinXRay", "Clusters"});
 	Compare(Draw(c_Small), "skin-xray");
-	Options().m_SolvingSubject.m_bSkin = false;
+	ShowOnly("SolvingSubject", {"Enabled", "SkinXRay", "Clusters"});
 	EXPECT_EQ(Draw(c_Small), bare);
-	Options().m_SolvingSubject.m_bSkinXRay = false;
-	Options().m_SolvingSubject.m_bSkin = true;
+	ShowOnly("SolvingSubject", {"Enabled", "Skin", "Clusters"});
 	Show(nullptr, {0, 255, 255, 128});
 	Compare(Draw(c_Small), "skin-tinted");
 	// The limb's marker is missing.
@@ -166,7 +164,7 @@ TEST_P(SkinPictures, OfTheClustersOfASubject)
 	m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, {});
 	Wear();
 	Compare(Draw(c_Small), "skin-cluster");
-	Options().m_SolvingSubject.m_bClusters = false;
+	ShowOnly("SolvingSubject", {"Enabled", "Skin"});
 	EXPECT_EQ(Draw(c_Small), without);
 }
 

@@ -1,7 +1,5 @@
 #include "CoreGraphics/RenderContext.h"
-#include "CoreGraphics/SelectionId.h"
 #include "OrlexGraphics/FrameRenderer.h"
-#include "OrlexGraphics/SelectionRegistry.h"
 #include "OrlexGraphics/SphereHelper.h"
 #include "SceneFixture.h"
 #include "ViewFixture.h"
@@ -9,70 +7,22 @@
 #include <QImage>
 
 #include <cmath>
-#include <thread>
 
 namespace
 {
 
 using OrlexGraphics::VFrameRenderer;
 
-/// Spheres, all of one radius in pixels, beside the boxes.
-class VSpheres : public OrlexGraphics::IRenderType
+/// In a row, 20 pixels apart, of radii in pixels.
+void AddSpheres(const std::vector<double>& i_rRadii, VBoxScene& io_rScene)
 {
-public:
-	VSpheres(std::shared_ptr<OrlexGraphics::VSphereHelper> i_pHelper) : m_pHelper(std::move(i_pHelper)) {}
-
-	void Render(CoreGraphics::VRenderContext& io_rContext, const OrlexGraphics::VSceneOptions& /*i_rOptions*/,
-	    std::uint32_t i_Pass) override
+	for (std::uint32_t i = 0; const double radius : i_rRadii)
 	{
-		if (i_Pass != OrlexGraphics::EPassOpaque)
-			return;
-		m_pHelper->Begin(io_rContext);
-		for (std::size_t i = 0; i < m_Spheres.size(); ++i)
-			m_pHelper->Draw(io_rContext, m_Spheres[i], m_Ids[i], {1, 1, 1, 1}, 3);
-		m_pHelper->End(io_rContext);
+		const QPointF middle(20.0 * i + 20.5, 120.5), reach(radius, radius);
+		io_rScene.m_Next.m_Boxes.push_back({Item(100 + i++), {middle - reach, middle + reach}, 0.0f, {1, 1, 1, 1},
+		    OrlexGraphics::EPassOpaque, {}, true});
 	}
-
-	const std::shared_ptr<OrlexGraphics::VSphereHelper> m_pHelper;
-	std::vector<QVector4D> m_Spheres;
-	std::vector<CoreGraphics::VSelectionId> m_Ids;
-};
-
-class VSphereScene : public VBoxScene
-{
-public:
-	using VBoxScene::VBoxScene;
-
-	void InitialiseGL() override
-	{
-		VBoxScene::InitialiseGL();
-		if (m_pSpheres)
-			return;
-		m_pSpheres = std::make_shared<VSpheres>(m_pSphereHelper);
-		m_RenderList.push_back(m_pSpheres);
-	}
-
-	void Refresh() override
-	{
-		VBoxScene::Refresh();
-		CoreGraphics::VCameraController front;
-		front.m_Type = CoreGraphics::ECameraFront;
-		const QMatrix4x4 toWorld = front.Orientation().inverted();
-		m_pSpheres->m_Spheres.clear();
-		m_pSpheres->m_Ids.clear();
-		for (std::size_t i = 0; i < m_Radii.size(); ++i)
-		{
-			// A row of pixels apart, 4 mm each.
-			const QVector3D eye(4.0f * (20.0f * static_cast<float>(i) + 20.5f - 100.0f), 4.0f * (80.0f - 120.5f), 0.0f);
-			m_pSpheres->m_Spheres.emplace_back(toWorld.map(eye), 4.0f * m_Radii[i]);
-			m_pSpheres->m_Ids.push_back(m_pRegistry->GetId(Item(100 + static_cast<std::uint32_t>(i))));
-		}
-	}
-
-	/// Pixels.
-	std::vector<float> m_Radii;
-	std::shared_ptr<VSpheres> m_pSpheres;
-};
+}
 
 class Offscreen : public VSceneTest
 {
@@ -82,22 +32,18 @@ protected:
 	void SetUp() override
 	{
 		ASSERT_NO_FATAL_FAILURE(VSceneTest::SetUp());
-		m_pScene = Show<VSphereScene>();
+		m_pScene = Show<VBoxScene>();
 		m_pScene->m_Size = m_Size;
 		Camera().m_Type = CoreGraphics::ECameraFront;
 		Camera().SetSize(m_Size);
 	}
 
-	/// By element index.
 	std::vector<std::uint32_t> Picked(const QPoint& i_rMouse, const std::optional<QPoint>& i_rStart = {})
 	{
-		std::vector<std::uint32_t> indices;
-		for (const NVX::ISelectionItem& rItem : Pick(i_rMouse, i_rStart))
-			indices.push_back(rItem.m_ElementIndex);
-		return indices;
+		return Indices(Pick(i_rMouse, i_rStart));
 	}
 
-	std::shared_ptr<VSphereScene> m_pScene;
+	std::shared_ptr<VBoxScene> m_pScene;
 };
 
 INSTANTIATE_IN_BOTH_DIALECTS(Offscreen);
@@ -166,7 +112,7 @@ TEST_P(Offscreen, PicksRectanglesExactlyOrThroughLayers)
 
 TEST_P(Offscreen, DrawsSpheresByTheirSizeOnScreen)
 {
-	m_pScene->m_Radii = {0.0f, 0.5f, 1.3f, 3.0f, 9.0f};
+	AddSpheres({0.0, 0.5, 1.3, 3.0, 9.0}, *m_pScene);
 	Frame();
 	const QImage image = m_pTarget->toImage();
 	const auto lit = [&](int i_Index)
@@ -208,7 +154,7 @@ TEST(SphereHelper, ChoosesTheMeshByTheEdgesOnScreen)
 TEST_P(Offscreen, GoesOnInAContextThatSharesNothing)
 {
 	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}};
-	m_pScene->m_Radii = {1.0f, 9.0f};
+	AddSpheres({1.0, 9.0}, *m_pScene);
 	m_pSelection->Selection().Replace({Item(1)});
 	Frame();
 	const QImage before = m_pTarget->toImage();

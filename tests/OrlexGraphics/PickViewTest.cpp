@@ -9,7 +9,7 @@
 namespace
 {
 
-using Indices = std::vector<std::uint32_t>;
+using VIndices = std::vector<std::uint32_t>;
 
 TEST_F(VViewTest, SelectsWithTheMouse)
 {
@@ -22,7 +22,7 @@ TEST_F(VViewTest, SelectsWithTheMouse)
 		const char* m_pName;
 		QPoint m_Where;
 		Qt::KeyboardModifiers m_Modifiers;
-		Indices m_Expected;
+		VIndices m_Expected;
 	} rows[] = {
 	    {"a click replaces all", one, {}, {1}},
 	    {"Shift adds", two, Qt::ShiftModifier, {1, 2}},
@@ -61,7 +61,7 @@ TEST_F(VViewTest, SelectsARectangleThroughSixteenLayers)
 	Release({110, 110}, Qt::AltModifier);
 	ASSERT_TRUE(Commit());
 	// The handles are in front of all and take a place in the first layer.
-	Indices expected(16);
+	VIndices expected(16);
 	std::iota(expected.begin(), expected.end(), 0u);
 	EXPECT_EQ(Selected(), expected) << "no handles, nothing behind the layers, nothing beside the rectangle";
 
@@ -78,13 +78,13 @@ TEST_F(VViewTest, SelectsARectangleThroughSixteenLayers)
 	Drag({152, 51}, Qt::AltModifier);
 	Release({152, 51}, Qt::AltModifier);
 	ASSERT_TRUE(Commit());
-	EXPECT_EQ(Selected(), Indices{90});
+	EXPECT_EQ(Selected(), VIndices{90});
 
 	m_pScene->m_bExactPick = true;
 	Press({30, 30}, Qt::AltModifier);
 	Release({110, 110}, Qt::AltModifier);
 	ASSERT_TRUE(Commit());
-	EXPECT_EQ(Selected(), Indices{0}) << "one layer alone, but for the handles";
+	EXPECT_EQ(Selected(), VIndices{0}) << "one layer alone, but for the handles";
 }
 
 TEST_F(VViewTest, PicksHandlesByPointOnly)
@@ -96,11 +96,11 @@ TEST_F(VViewTest, PicksHandlesByPointOnly)
 	{
 		const QPoint where(80 * static_cast<int>(index) - 40, 40);
 		Hover(where);
-		EXPECT_TRUE(Until([&] { return Preselected() == Indices{index}; }));
+		EXPECT_TRUE(Until([&] { return Preselected() == VIndices{index}; }));
 		// Nobody takes the press here: what the handle is for stays selected.
 		Click(where);
 		ASSERT_TRUE(Commit());
-		EXPECT_EQ(Selected(), Indices{9});
+		EXPECT_EQ(Selected(), VIndices{9});
 		EXPECT_TRUE(Preselected().empty());
 	}
 }
@@ -127,7 +127,7 @@ TEST_F(VViewTest, SwapsTheMouseByThePreference)
 			// A click is a click with either of them.
 			Click({x, 40}, modifiers);
 			ASSERT_TRUE(Commit());
-			EXPECT_EQ(Selected(), Indices{index});
+			EXPECT_EQ(Selected(), VIndices{index});
 		}
 	}
 }
@@ -140,10 +140,10 @@ TEST_F(VViewTest, ShowsWhatTheMousePointsAt)
 	Show();
 	QSignalSpy toolTips(m_pView, &OrlexGraphics::VSceneFramebufferObject::ToolTipTextChanged);
 	Hover({24, 24});
-	EXPECT_TRUE(Until([&] { return Preselected() == Indices{0}; }));
+	EXPECT_TRUE(Until([&] { return Preselected() == VIndices{0}; }));
 	EXPECT_EQ(m_pView->GetToolTipText(), "a");
 	Hover({34, 24});
-	EXPECT_TRUE(Until([&] { return Preselected() == Indices{1}; }));
+	EXPECT_TRUE(Until([&] { return Preselected() == VIndices{1}; }));
 	EXPECT_EQ(m_pView->GetToolTipText(), "b");
 	EXPECT_EQ(toolTips.count(), 2);
 
@@ -170,7 +170,7 @@ TEST_F(VViewTest, PreselectsWhatAClickWouldChange)
 	const struct
 	{
 		Qt::KeyboardModifiers m_Modifiers;
-		Indices m_Expected;
+		VIndices m_Expected;
 	} rows[] = {
 	    {{}, {1, 2}},
 	    {Qt::ShiftModifier, {2}},
@@ -186,7 +186,7 @@ TEST_F(VViewTest, PreselectsWhatAClickWouldChange)
 		Drag({11, 11}, Qt::ShiftModifier | Qt::AltModifier);
 		Release({11, 11}, Qt::ShiftModifier | Qt::AltModifier);
 		ASSERT_TRUE(Commit());
-		EXPECT_EQ(Selected(), Indices{1});
+		EXPECT_EQ(Selected(), VIndices{1});
 	}
 }
 
@@ -211,7 +211,7 @@ TEST_F(VViewTest, TellsAClickFromMovingTheCamera)
 	EXPECT_FLOAT_EQ(rCamera.m_Yaw, yaw + 0.8f);
 	Release({104, 80});
 	EXPECT_EQ(m_pView->MouseState(), OrlexGraphics::EMouseIdle) << "no click";
-	EXPECT_EQ(Selected(), Indices{1});
+	EXPECT_EQ(Selected(), VIndices{1});
 
 	// The camera has let go.
 	Hover({150, 100});
@@ -224,14 +224,14 @@ TEST_F(VViewTest, LosesNoClickToTheMouseThatGoesOn)
 	Show();
 	Click({40, 40});
 	Hover({150, 120});
-	ASSERT_TRUE(Until([&] { return Selected() == Indices{1}; }));
+	ASSERT_TRUE(Until([&] { return Selected() == VIndices{1}; }));
 	// What moves the camera or the boxes lets the click wait for the picture that the operator does not see yet.
 	m_pSelection->Selection().Replace({});
 	Click({40, 40});
 	m_pScene->m_Next.m_Boxes[0].m_Item = Item(5);
 	m_pScene->RequestRefresh();
 	ASSERT_TRUE(Until([&] { return !Selected().empty(); }));
-	EXPECT_EQ(Selected(), Indices{5});
+	EXPECT_EQ(Selected(), VIndices{5});
 }
 
 TEST_F(VViewTest, GivesUpARectangleWithTheFocus)

@@ -4,6 +4,7 @@
 
 #include "CoreGraphics/RenderContext.h"
 #include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/SphereHelper.h"
 #include "OrlexGraphics/TesselInteractionMapper.h"
 
 #include <QMouseEvent>
@@ -21,8 +22,9 @@ namespace
 class VBoxes : public OrlexGraphics::IRenderType
 {
 public:
-	VBoxes(CoreGraphics::VShaderLibrary& io_rLibrary, std::shared_ptr<OrlexGraphics::VSelectionRegistry> i_pRegistry)
-	    : m_pRegistry(std::move(i_pRegistry)),
+	VBoxes(CoreGraphics::VShaderLibrary& io_rLibrary, std::shared_ptr<OrlexGraphics::VSelectionRegistry> i_pRegistry,
+	    std::shared_ptr<OrlexGraphics::VSphereHelper> i_pSpheres)
+	    : m_pRegistry(std::move(i_pRegistry)), m_pSpheres(std::move(i_pSpheres)),
 	      m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, "Simple3DModelColour", "Colour"))
 	{
 		m_State.m_bDepthTest = true;
@@ -54,6 +56,8 @@ public:
 			    c_Scale * static_cast<float>(rBox.m_Place.height()), 1.0f);
 			drawn.m_Colour = rBox.m_Colour;
 			drawn.m_Pass = rBox.m_Pass;
+			if (rBox.m_bSphere)
+				drawn.m_Sphere.emplace(toWorld.map(eye), 0.5f * c_Scale * static_cast<float>(rBox.m_Place.width()));
 			const float radius =
 			    0.5f * c_Scale * static_cast<float>(std::hypot(rBox.m_Place.width(), rBox.m_Place.height())) + 1.0f;
 			m_pRegistry->SetItemBound(rBox.m_Item, QVector4D(toWorld.map(eye), radius));
@@ -65,6 +69,8 @@ public:
 	void Render(CoreGraphics::VRenderContext& io_rContext, const OrlexGraphics::VSceneOptions& /*i_rOptions*/,
 	    std::uint32_t i_Pass) override
 	{
+		if (i_Pass == OrlexGraphics::EPassOpaque)
+			RenderSpheres(io_rContext);
 		const bool bSelection = io_rContext.m_Mode != CoreGraphics::ERenderNormal;
 		if (!io_rContext.UseProgram(m_Program.Get(bSelection)))
 			return;
@@ -72,7 +78,7 @@ public:
 		io_rContext.BindVertices(m_Box.m_Vertices);
 		for (const VDrawn& rDrawn : m_Drawn)
 		{
-			if (rDrawn.m_Pass != i_Pass
+			if (rDrawn.m_Pass != i_Pass || rDrawn.m_Sphere
 			    || (bSelection && (rDrawn.m_Id.m_Id == 0 || m_pRegistry->IsHidden(rDrawn.m_Id, io_rContext.m_Mode))))
 				continue;
 			if (bSelection)
@@ -90,9 +96,20 @@ private:
 		QVector4D m_Colour;
 		CoreGraphics::VSelectionId m_Id;
 		std::uint32_t m_Pass = 0;
+		std::optional<QVector4D> m_Sphere;
 	};
 
+	void RenderSpheres(CoreGraphics::VRenderContext& io_rContext)
+	{
+		m_pSpheres->Begin(io_rContext);
+		for (const VDrawn& rDrawn : m_Drawn)
+			if (rDrawn.m_Sphere)
+				m_pSpheres->Draw(io_rContext, *rDrawn.m_Sphere, rDrawn.m_Id, rDrawn.m_Colour, 3);
+		m_pSpheres->End(io_rContext);
+	}
+
 	const std::shared_ptr<OrlexGraphics::VSelectionRegistry> m_pRegistry;
+	const std::shared_ptr<OrlexGraphics::VSphereHelper> m_pSpheres;
 	CoreGraphics::VSelectableProgram m_Program;
 	CoreGraphics::VShape m_Box = CoreGraphics::MakeBox(false);
 	CoreGraphics::VUniform m_ModelTransform{"u_ModelTransform"};
@@ -102,19 +119,19 @@ private:
 	std::vector<VDrawn> m_Drawn;
 };
 
+} // namespace
+
+NVX::ISelectionItem Item(std::uint32_t i_Index, std::uint32_t i_Kind)
+{
+	return {i_Kind, 0x0fffffff, i_Index, {}};
+}
+
 std::vector<std::uint32_t> Indices(const std::vector<NVX::ISelectionItem>& i_rItems)
 {
 	std::vector<std::uint32_t> indices;
 	for (const NVX::ISelectionItem& rItem : i_rItems)
 		indices.push_back(rItem.m_ElementIndex);
 	return indices;
-}
-
-} // namespace
-
-NVX::ISelectionItem Item(std::uint32_t i_Index, std::uint32_t i_Kind)
-{
-	return {i_Kind, 0x0fffffff, i_Index, {}};
 }
 
 std::atomic<int> VBoxScene::s_GLErrors = 0;
@@ -124,7 +141,7 @@ void VBoxScene::InitialiseGL()
 	VFlowScene::InitialiseGL();
 	if (m_pBoxes)
 		return;
-	m_pBoxes = std::make_shared<VBoxes>(*m_pShaderLibrary, m_pRegistry);
+	m_pBoxes = std::make_shared<VBoxes>(*m_pShaderLibrary, m_pRegistry, m_pSphereHelper);
 	m_RenderList.push_back(m_pBoxes);
 }
 

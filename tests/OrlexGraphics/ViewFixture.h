@@ -44,6 +44,8 @@ struct VBox
 	QVector4D m_Colour{0.0f, 0.0f, 1.0f, 1.0f};
 	std::uint32_t m_Pass = OrlexGraphics::EPassOpaque;
 	std::string m_Name = {};
+	/// What fits into it is drawn instead.
+	bool m_bSphere = false;
 };
 
 /// What the user interface thread hands to a frame.
@@ -151,3 +153,4 @@ protected:
 };
 
 NVX::ISelectionItem Item(std::uint32_t i_Index, std::uint32_t i_Kind = NVX::ESelectionTargetSegment);
+std::vector<std::uint32_t> Indices(const std::vector<NVX::ISelectionItem>& i_rItems);
