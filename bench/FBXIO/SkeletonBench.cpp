@@ -4,8 +4,8 @@
 #include "Character.h"
 #include "PeakMemory.h"
 
+#include "../../tests/UtilsFileSystem/Folder.h"
 #include "../../tests/fbxsdk/FbxFileBuilder.h"
-#include "../../tests/fbxsdk/TestFile.h"
 
 #include "FBXIO/FBXReader.h"
 
@@ -126,8 +126,9 @@ void Chain(benchmark::State& io_rState, const FbxTest::VTestForm& i_rForm)
 		scene.m_Nodes.push_back({"bone" + std::to_string(i), "LimbNode", i - 1,
 		    {{"Lcl Translation", {10.5, 0.25, 0}}, {"Lcl Rotation", {10, 20, 30}}, {"PreRotation", {5, 6, 7}},
 		        {"RotationActive", {1}}}});
-	const FbxTest::VTestFile file(FbxTest::Write(i_rForm, scene));
-	Skeleton(io_rState, file.Path());
+	const VTestFolder folder;
+	Put(folder / "chain.fbx", FbxTest::Write(i_rForm, scene));
+	Skeleton(io_rState, (folder / "chain.fbx").string());
 }
 
 } // namespace
@@ -161,8 +162,9 @@ int main(int i_Count, char** i_ppArguments)
 	         "own_ns_yup_cm_a7400", "own_ns_yup_cm_b7400", "pab_arnaud_b7500"})
 		compare(pFile, std::string(RETARGET_TEST_DATA "/fbx/") + pFile + ".fbx", true);
 	compare("ufbx_maya_human_ik_7400_binary", RETARGET_TEST_DATA "/fbx/ufbx_maya_human_ik_7400_binary.fbx", false);
-	const FbxTest::VTestFile character(GeneratedCharacter());
-	compare("character", character.Path(), true);
+	const VTestFolder folder;
+	Put(folder / "character.fbx", GeneratedCharacter());
+	compare("character", (folder / "character.fbx").string(), true);
 	for (const FbxTest::VTestForm& rForm : FbxTest::c_Forms)
 	{
 		auto* const pChain =

@@ -1,9 +1,9 @@
+#include "../UtilsFileSystem/Folder.h"
 #include "../UtilsFileSystem/Log.h"
 
 #include "FBXIO/FBXReader.h"
 
 #include "FbxFileBuilder.h"
-#include "TestFile.h"
 
 #include <gtest/gtest.h>
 
@@ -165,7 +165,9 @@ TEST_P(Reader, TransformsThatAreNotFiniteBecomeTheIdentity)
 
 TEST_P(Reader, ProgressRisesAndCanEndTheImport)
 {
-	const VTestFile file(Write(GetParam(), Bones({{"hips", "LimbNode", -1, {}}})));
+	const VTestFolder folder;
+	const std::string path = (folder / "file.fbx").string();
+	Put(path, Write(GetParam(), Bones({{"hips", "LimbNode", -1, {}}})));
 	std::vector<float> told;
 	// The call that ends it; the last time none does.
 	for (std::size_t end = 0;; ++end)
@@ -179,7 +181,7 @@ TEST_P(Reader, ProgressRisesAndCanEndTheImport)
 			    told.push_back(i_Part);
 			    return told.size() != end + 1;
 		    });
-		EXPECT_TRUE(reader.LoadFile(file.Path()));
+		EXPECT_TRUE(reader.LoadFile(path));
 		const bool bEnded = told.size() == end + 1;
 		EXPECT_EQ(reader.IsComplete(), !bEnded);
 		EXPECT_EQ(reader.HasSkeleton(), !bEnded);

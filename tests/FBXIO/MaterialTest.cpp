@@ -1,3 +1,4 @@
+#include "../UtilsFileSystem/Folder.h"
 #include "../UtilsFileSystem/Log.h"
 
 #include "FBXIO/FBXReader.h"
@@ -9,31 +10,17 @@
 
 #include <gtest/gtest.h>
 
-#include <boost/filesystem/operations.hpp>
-
-#include <fstream>
-
 using namespace FBXIO;
 using namespace FbxTest;
 
 namespace
 {
 
-/// A folder that ends with its scope, for a file and its textures.
+/// A folder for a file and its textures, and what is told of them.
 class Material : public testing::TestWithParam<VTestForm>
 {
 protected:
-	Material() : m_Folder(boost::filesystem::temp_directory_path() / boost::filesystem::unique_path())
-	{
-		boost::filesystem::create_directories(m_Folder / "maps");
-		m_pSink = NVX::GlobalLog::AddSink(
-		    [this](const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rText)
-		    {
-			    if (i_rCategory.Name() == "Import" && i_Level == NVX::ELogError)
-				    m_Failed.push_back(i_rText);
-		    });
-	}
-	~Material() override { boost::filesystem::remove_all(m_Folder); }
+	Material() { create_directory(m_Folder / "maps"); }
 
 	std::string Path(const std::string& i_rName) const { return (m_Folder / i_rName).string(); }
 
@@ -48,8 +35,10 @@ protected:
 	    const VTestLayer& i_rLayer = {"AllSame", "IndexToDirect", {}, {0}}, const VTestLayer& i_rTextures = {})
 	{
 		const VTestScene scene{{{"body", "Mesh", -1, {}}}, {}, {}, {}};
-		std::ofstream(Path("hero.fbx"), std::ios::binary) << Write(GetParam(), scene,
-		    {{0, {0, 0, 0, 1, 0, 0, 0, 1, 0}, {0, 1, -3, 0, 2, -2}, {}, {}, i_rLayer, i_rMaterials, {}, i_rTextures}});
+		Put(Path("hero.fbx"),
+		    Write(GetParam(), scene,
+		        {{0, {0, 0, 0, 1, 0, 0, 0, 1, 0}, {0, 1, -3, 0, 2, -2}, {}, {}, i_rLayer, i_rMaterials, {},
+		            i_rTextures}}));
 		FBXReader reader;
 		EXPECT_TRUE(reader.LoadFile(Path("hero.fbx")));
 		VBasicMesh mesh;
@@ -57,9 +46,8 @@ protected:
 		return mesh.m_Parts;
 	}
 
-	boost::filesystem::path m_Folder;
-	std::vector<std::string> m_Failed;
-	std::shared_ptr<void> m_pSink;
+	const VTestFolder m_Folder;
+	VTestLog m_Failed{"Import"};
 };
 
 INSTANTIATE_TEST_SUITE_P(
@@ -115,7 +103,6 @@ TEST_P(Material, TexturesAreLookedForInTurn)
 	for (const auto& rRow : rows)
 	{
 		SCOPED_TRACE(rRow.m_pName);
-		m_Failed.clear();
 		const VTestMaterial material{"lambert", {}, rRow.m_FileName, rRow.m_RelativeName};
 		const std::vector<VMeshPart> parts = Read({material, material});
 		ASSERT_EQ(parts.size(), 2u);
@@ -124,10 +111,8 @@ TEST_P(Material, TexturesAreLookedForInTurn)
 		EXPECT_EQ(parts[0].m_pTexture, parts[1].m_pTexture) << "one image for both";
 		std::vector<std::string> failed;
 		if (rRow.m_Width == 0 && !rRow.m_Path.empty())
-			failed = {"Failed to load " + rRow.m_Path};
-		if (!m_Failed.empty())
-			m_Failed.resize(1);
-		EXPECT_EQ(m_Failed, failed);
+			failed = {"2 Failed to load " + rRow.m_Path};
+		EXPECT_EQ(m_Failed.Take(), failed);
 	}
 }
 
@@ -135,45 +120,43 @@ TEST_P(Material, PicturesInTheFileComeFirst)
 {
 	WritePicture("skin.png", 3);
 	WritePicture("other.png", 5);
-	std::ifstream other(Path("other.png"), std::ios::binary);
-	const std::string picture{std::istreambuf_iterator<char>(other), {}};
-	const std::vector<VMeshPart> parts = Read({{"lambert", {}, "C:\\art\\skin.png", "", picture}});
+	const std::vector<VMeshPart> parts = Read({{"lambert", {}, "C:\\art\\skin.png", "", Get(Path("other.png"))}});
 	ASSERT_EQ(parts.size(), 1u);
 	ASSERT_NE(parts[0].m_pTexture, nullptr);
 	EXPECT_EQ(parts[0].m_pTexture->width(), 5);
 	EXPECT_EQ(parts[0].m_TexturePath, "C:\\art\\skin.png");
-	EXPECT_TRUE(m_Failed.empty());
+	EXPECT_TRUE(m_Failed.Take().empty());
 	// One that is no picture: that beside the file.
 	const std::vector<VMeshPart> broken = Read({{"lambert", {}, "skin.png", "", "no picture"}});
 	ASSERT_NE(broken.at(0).m_pTexture, nullptr);
 	EXPECT_EQ(broken[0].m_pTexture->width(), 3);
-	EXPECT_EQ(m_Failed, (std::vector<std::string>{"Failed to load skin.png (embedded)"}));
+	EXPECT_EQ(m_Failed.Take(), std::vector<std::string>{"2 Failed to load skin.png (embedded)"});
 }
 
 /// A head that promises more than a picture may have.
 TEST_P(Material, PicturesAreBounded)
 {
-	std::ofstream(Path("huge.ppm"), std::ios::binary) << "P6 20000 20000 255\n";
+	Put(Path("huge.ppm"), "P6 20000 20000 255\n");
 	EXPECT_EQ(Read({{"lambert", {}, Path("huge.ppm"), ""}}).at(0).m_pTexture, nullptr);
-	EXPECT_EQ(m_Failed,
-	    (std::vector<std::string>{"Failed to load " + Path("huge.ppm")
+	EXPECT_EQ(m_Failed.Take(),
+	    (std::vector<std::string>{"2 Failed to load " + Path("huge.ppm")
 	        + ": its 20000 by 20000 points, or all pictures of the FBX file together, are too large"}));
 	// Scans that cost as much as the picture, however small they are.
 	QBuffer buffer;
 	QImage(3, 1, QImage::Format_RGB32).save(&buffer, "JPG");
 	for (const int scans : {0, 100})
 	{
-		std::ofstream(Path("scans.jpg"), std::ios::binary)
-		    << (buffer.data() + QByteArray("\xff\xda").repeated(scans)).toStdString();
+		Put(Path("scans.jpg"), (buffer.data() + QByteArray("\xff\xda").repeated(scans)).toStdString());
 		EXPECT_EQ(Read({{"lambert", {}, Path("scans.jpg"), ""}}).at(0).m_pTexture == nullptr, scans > 0);
 	}
 	// Together: two that are allowed, and a third that is not. Before version 7 the first is that of all materials.
 	std::vector<VTestMaterial> materials;
 	for (const char* pName : {"a", "b", "c"})
 		materials.push_back({"lambert", {}, pName, "", "P6 4000 4000 255\n"});
-	m_Failed.clear();
+	m_Failed.Take();
 	Read(materials);
-	EXPECT_EQ(std::count_if(m_Failed.begin(), m_Failed.end(),
+	const std::vector<std::string> failed = m_Failed.Take();
+	EXPECT_EQ(std::count_if(failed.begin(), failed.end(),
 	              [](const std::string& i_rText) { return i_rText.find("too large") != std::string::npos; }),
 	    GetParam().m_Version < 7000 ? 0 : 1);
 }
@@ -226,7 +209,7 @@ TEST_P(Material, OfAnUnknownClassHasNoTexture)
 	EXPECT_EQ(parts[0].m_pTexture, nullptr);
 	ASSERT_NE(parts[1].m_pTexture, nullptr);
 	EXPECT_EQ(parts[1].m_pTexture->width(), 3);
-	EXPECT_TRUE(m_Failed.empty());
+	EXPECT_TRUE(m_Failed.Take().empty());
 }
 
 } // namespace

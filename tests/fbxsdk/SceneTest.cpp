@@ -83,7 +83,7 @@ TEST(Scene, ImporterRefusesWhatItCannotDo)
 	EXPECT_TRUE(file.m_bImported);
 	EXPECT_FALSE(file.m_pImporter->Import(file.m_pScene, true));
 	EXPECT_FALSE(file.m_pImporter->Import(nullptr, false));
-	EXPECT_FALSE(file.m_pImporter->Initialize(file.m_File.Path().c_str(), 2, nullptr));
+	EXPECT_FALSE(file.m_pImporter->Initialize(file.m_Path.c_str(), 2, nullptr));
 	EXPECT_EQ(file.m_pImporter->GetStatus().GetCode(), FbxStatus::eInvalidParameter);
 	EXPECT_FALSE(file.m_pImporter->Import(file.m_pScene, false));
 	EXPECT_EQ(file.Root()->GetChild(0), nullptr);
