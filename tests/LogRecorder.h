@@ -5,6 +5,7 @@
 #include <memory>
 #include <mutex>
 #include <string>
+#include <utility>
 
 /// What the log receives while this lives, from any thread: one line for each message, as "3 RetargetSetup: text".
 class VLogRecorder

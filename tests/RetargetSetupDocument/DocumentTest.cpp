@@ -175,7 +175,13 @@ TEST_F(Document, TheScale)
 		EXPECT_EQ(m_Document.GetTargetScale(), 2.0);
 		EXPECT_EQ(log.Take().find("3 RetargetSetup: A scale must be a finite number above 0, not "), 0u);
 	}
+	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
+	m_Document.SetNextTargetScale(3.0);
+	m_Document.SetNextTargetScale(0.0);
+	EXPECT_EQ(m_Document.GetTargetScale(), 2.0) << "the next subject's";
 	EXPECT_EQ(m_Changes, 0);
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(m_Document.GetTargetScale(), 3.0);
 }
 
 TEST_F(Document, PruningTellsHowFarThePoseWent)

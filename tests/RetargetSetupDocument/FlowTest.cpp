@@ -133,7 +133,7 @@ TEST_F(Flow, FilesThatCannotBeReadChangeNothing)
 TEST_F(Flow, ALegacyFileBecomesASubjectOfToday)
 {
 	CoreOrlexTypes::VSubjectRecord record;
-	record.m_SubjectParametrised = MakeSubject({{"pelvis", -1}, {"arm", 0}});
+	record.m_SubjectParametrised = MakeSubject({{"pelvis", -1}, {"arm", 0}, {"hand", 1}});
 	for (auto& rSegment : record.m_SubjectParametrised.m_Segments)
 	{
 		rSegment.m_Joint.m_TPoseMean = rSegment.m_Joint.m_BindPose;
@@ -141,6 +141,8 @@ TEST_F(Flow, ALegacyFileBecomesASubjectOfToday)
 		rSegment.m_Joint.m_TPoseCovariance = {7};
 		rSegment.m_Joint.m_BindPose.clear();
 	}
+	auto& rHand = record.m_SubjectParametrised.m_Segments[2].m_Joint;
+	rHand.m_BindPose.swap(rHand.m_TPoseMean);
 	record.m_SubjectApplicationData.m_RetargetSourceTemplate = "Anna";
 	std::string text = "{\"Version\":[1,0,1],\"Schema\":\"any\"}\n";
 	ASSERT_TRUE(CoreOrlexTypes::WriteText(record, text, CoreOrlexTypes::ETextSpelling::EPositional));
@@ -154,12 +156,13 @@ TEST_F(Flow, ALegacyFileBecomesASubjectOfToday)
 	EXPECT_EQ(m_Document.LoadTargetSubject(m_Folder / "old.qrx"), 0u);
 	EXPECT_EQ(log.Take(),
 	    "3 RetargetSetup: Legacy file: the id 0 of the application data becomes 268435455\n"
-	    "3 RetargetSetup: Legacy file: the application data of 0 segments is brought to the subject's 2");
+	    "3 RetargetSetup: Legacy file: the application data of 0 segments is brought to the subject's 3");
 	m_Host.Dispatcher().RunPending();
 	EXPECT_EQ(names, "'''Anna'") << "published first; a queued callback sees the new name";
 	EXPECT_EQ(Target().m_Segments[1].m_Joint.m_BindPose, (std::vector<double>{0.25, 0, 0}));
 	EXPECT_TRUE(Target().m_Segments[1].m_Joint.m_TPoseMean.empty());
 	EXPECT_TRUE(Target().m_Segments[1].m_Joint.m_TPoseCovariance.empty());
+	EXPECT_TRUE(Target().m_Segments[2].m_Joint.m_BindPose.empty()) << "replaced by a T-pose that there is not";
 	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "new.qrr"), 0u);
 	EXPECT_EQ(m_Document.LoadTargetSubject(m_Folder / "new.qrr"), 0u);
 	EXPECT_EQ(m_Document.GetSourceName(), "Anna");
