@@ -2,12 +2,11 @@
 
 #include "FBXIO/FBXReader.h"
 
-#include <fbxsdk.h>
-#include <gtest/gtest.h>
+#include "Imported.h"
+
 #include <nlohmann/json.hpp>
 
 #include <filesystem>
-#include <fstream>
 #include <map>
 
 using namespace FBXIO;
@@ -21,8 +20,8 @@ const std::string c_Demo = "../../../demo/character";
 /// What other programs found in each file: those of exporters, and small ones about one matter each.
 nlohmann::json Reference(const std::string& i_rName)
 {
-	std::ifstream file(c_Folder + (i_rName.starts_with("cases/") ? "" : "reference/") + i_rName + ".json");
-	return nlohmann::json::parse(file);
+	return nlohmann::json::parse(
+	    Get(c_Folder + (i_rName.starts_with("cases/") ? "" : "reference/") + i_rName + ".json"));
 }
 
 std::vector<std::string> Files()
@@ -148,20 +147,16 @@ void CountClusters(FbxNode& i_rNode, std::map<std::string, int>& io_rCounts)
 TEST_P(ReferenceFile, ClustersAgree)
 {
 	const nlohmann::json reference = Reference(GetParam());
-	FbxManager* const pManager = FbxManager::Create();
-	FbxScene* const pScene = FbxScene::Create(pManager, "scene");
-	FbxImporter* const pImporter = FbxImporter::Create(pManager, "importer");
-	ASSERT_TRUE(pImporter->Initialize((c_Folder + GetParam() + ".fbx").c_str(), -1, nullptr));
-	ASSERT_TRUE(pImporter->Import(pScene, false));
+	FbxTest::VImported file(Get(c_Folder + GetParam() + ".fbx"));
+	ASSERT_TRUE(file.m_bImported);
 	std::map<std::string, int> counts;
-	CountClusters(*pScene->GetRootNode(), counts);
+	CountClusters(*file.Root(), counts);
 	int sum = 0;
 	for (const auto& [rName, rCount] : counts)
 		sum += rCount;
 	EXPECT_EQ(sum, reference["clusters"]);
 	for (const nlohmann::json& rMesh : reference["placedMeshes"])
 		EXPECT_EQ(counts[rMesh["name"]], rMesh["skinClusters"]) << rMesh["name"];
-	pManager->Destroy();
 }
 
 TEST_P(ReferenceFile, SkinsAgree)

@@ -27,6 +27,8 @@ TEST(Check, DamagedFiles)
 	const std::string version = Data("qrt/version-3.5.qrs");
 	const VScratchFolder folder;
 	folder.Write("matrix.qrs", Replaced(version, "COVARIANCE=\"7 0 0 0 8", "COVARIANCE=\"7 0 0 0 -8"));
+	folder.Write("template.qrs", Replaced(version, "COVARIANCE=\"3 0 0 0 3", "COVARIANCE=\"3 1 0 0 3"));
+	folder.Write("weight.qrs", Replaced(version, "WEIGHT=\"2\"", "WEIGHT=\"-2\""));
 	folder.Write("normal.qrs", Replaced(version, "VIEW-NORMAL=\"0 0 1\"", "VIEW-NORMAL=\"0 0 2\""));
 	folder.Write("state.qrs", Replaced(version, "POSITION=\"1*Scale 0 0\"", "POSITION=\"1*Scal 0 0\""));
 	folder.Write("static.qrs", Replaced(version, "EXPRESSION=\"Height*2\"", "EXPRESSION=\"Heigh*2\""));
@@ -46,6 +48,9 @@ TEST(Check, DamagedFiles)
 	            "segment #1 \"Spine\": Invalid joint covariance matrix\n"
 	            "    Give Covariance eigenvalues above 0, or set all its entries to 0.\n",
 	            ""},
+	        {"remedy of a template", {"check", "template.qrs"}, 1,
+	            "    Make TemplateCovariance symmetric: each entry equal to its mirror, to 1e-12.\n2 findings\n", ""},
+	        {"remedy of a weight", {"check", "weight.qrs"}, 1, "\n    Set Weight to 0 or more.\n", ""},
 	        {"told at load", {"check", "state.qrs"}, 1,
 	            "target #0 \"point\": Target 0, state component 0, invalid expresssion: Parse Error at column 7: ID "
 	            "\"Scal\" was referenced but never declared\n    Correct \"1*Scal\": ",

@@ -1,7 +1,6 @@
 #include "Rows.h"
 
 #include <cmath>
-#include <fstream>
 
 namespace
 {
@@ -173,8 +172,7 @@ TEST_F(Edit, MatchFilePoseOnRealCharacters)
 		           "--match-file-pose"},
 		    Data(std::string("fbx/") + rCharacter.m_pFile + ".fbx"));
 		const VJson segments = RunJson({"fk", "x.qrr"}, m_Folder).at("segments");
-		std::ifstream stream(Data(std::string("fbx/reference/") + rCharacter.m_pFile + ".json"));
-		const VJson reference = VJson::parse(stream);
+		const VJson reference = VJson::parse(Get(Data(std::string("fbx/reference/") + rCharacter.m_pFile + ".json")));
 		const double scale = rCharacter.m_pScale[0] - '0' + (rCharacter.m_pScale[2] - '0') / 10.0;
 		const bool bYUp = reference.at("upAxis") == 1;
 

@@ -1,7 +1,6 @@
 #include "Rows.h"
 
 #include <cmath>
-#include <fstream>
 #include <optional>
 
 namespace
@@ -64,8 +63,7 @@ TEST(Fbx, ShowsWhatTheReaderFinds)
 	const VScratchFolder folder;
 	const VJson actual =
 	    RunJson({"fbx", Data("fbx/ufbx_maya_transformed_skin_a6100.fbx"), "--meshes", "--skin"}, folder);
-	std::ifstream stream(Data("fbx/reference/ufbx_maya_transformed_skin_a6100.json"));
-	const VJson expected = VJson::parse(stream);
+	const VJson expected = VJson::parse(Get(Data("fbx/reference/ufbx_maya_transformed_skin_a6100.json")));
 	EXPECT_EQ(actual.at("upAxis"), expected.at("upAxis"));
 	EXPECT_EQ(actual.at("unitScale"), expected.at("unitScale"));
 	ASSERT_EQ(actual.at("bones").size(), expected.at("bones").size());
