@@ -77,6 +77,20 @@ TEST(Flow, AnItemTakesOnlyItsOwnType)
 	EXPECT_TRUE(SetItemValue(pFactory->CreateItem("FlowUnheardOf"), std::make_shared<const int>(3)));
 }
 
+TEST(Flow, AFrameKeepsItsItems)
+{
+	VPluginContext host;
+	const auto pFrame = host.GetFrameFactory()->CreateFrame();
+	pFrame->AddItem(nullptr);
+	EXPECT_FALSE(pFrame->Item("FlowSubject"));
+	auto pItem = host.GetItemFactory()->CreateItem("FlowSubject");
+	const auto* const pRaw = pItem.get();
+	pFrame->AddItem(pItem);
+	pItem = nullptr;
+	EXPECT_EQ(pFrame->Item("FlowSubject").get(), pRaw);
+	EXPECT_NE(host.GetFrameFactory()->CreateFrame(), pFrame);
+}
+
 TEST(PreferenceFolders, TellsOfChangesOnly)
 {
 	VPreferenceFolders folders;
@@ -88,6 +102,15 @@ TEST(PreferenceFolders, TellsOfChangesOnly)
 	folders.SetFolder("FolderRetargets", "/b");
 	EXPECT_EQ(told, "FolderSkins;FolderRetargets;");
 	EXPECT_EQ(folders.Folder("FolderSkins"), "/a");
+}
+
+TEST(PanelManager, KeepsPanelsInOrder)
+{
+	VPluginGui gui;
+	gui.GetPanelManager()->AddPanel("Last", 9, nullptr);
+	gui.GetPanelManager()->AddPanel("First", 1, nullptr);
+	ASSERT_EQ(gui.PanelManager().Panels().size(), 2u);
+	EXPECT_EQ(gui.PanelManager().Panels().front().m_Title, "First");
 }
 
 } // namespace

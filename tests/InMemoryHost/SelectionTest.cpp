@@ -66,6 +66,25 @@ TEST(Selection, OperationsRows)
 	}
 }
 
+TEST(Selection, ItemsOfOneKind)
+{
+	InMemoryHost::VSelection selection;
+	selection.Replace(Items("aBcD"));
+	EXPECT_EQ(Letters(selection.ItemsOfKind(NVX::ESelectionTargetSegment)), "BD");
+	EXPECT_EQ(Letters(selection.ItemsOfKind(NVX::ESelectionTarget)), "");
+}
+
+TEST(Selection, TheHostKeepsSelectionAndPreSelectionApart)
+{
+	InMemoryHost::VPluginContext host;
+	const auto pManager = host.GetSelectionManager();
+	ASSERT_TRUE(pManager);
+	pManager->Selection().Add(Items("a"));
+	pManager->PreSelection().Add(Items("b"));
+	EXPECT_EQ(Letters(host.GetSelectionManager()->Selection().Items()), "a");
+	EXPECT_EQ(Letters(host.SelectionManager().PreSelection().Items()), "b");
+}
+
 TEST(Selection, ACallbackMaySelect)
 {
 	InMemoryHost::VSelection selection;

@@ -59,4 +59,16 @@ TEST(ApplyDefaultPose, TheFirstHeadCountsAndOtherJointsKeepTheirs)
 	EXPECT_EQ(empty, VSubjectParametrised());
 }
 
+TEST(AdoptTPose, MovesIt)
+{
+	VSubjectParametrised subject = MakeSubject({{"Hips", -1}, {"Neck", 0}});
+	subject.m_Segments[0].m_Joint.m_TPoseMean = {1, 2, 3, 4, 5, 6};
+	subject.m_Segments[0].m_Joint.m_TPoseCovariance = {7};
+	AdoptTPoseAsBindPose(subject);
+	EXPECT_EQ(subject.m_Segments[0].m_Joint.m_BindPose, (std::vector<double>{1, 2, 3, 4, 5, 6}));
+	EXPECT_TRUE(subject.m_Segments[0].m_Joint.m_TPoseMean.empty());
+	EXPECT_TRUE(subject.m_Segments[0].m_Joint.m_TPoseCovariance.empty());
+	EXPECT_TRUE(subject.m_Segments[1].m_Joint.m_BindPose.empty()) << "replaced by a T-pose that there is not";
+}
+
 } // namespace

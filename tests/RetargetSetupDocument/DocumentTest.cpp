@@ -1,6 +1,13 @@
 #include "TestDocument.h"
 
+#include "RetargetSetupDocument/AngleAxis.h"
+#include "UtilsFileSystem/Paths.h"
+
+#include <QMetaMethod>
+#include <QMetaProperty>
+
 #include <limits>
+#include <numbers>
 
 namespace
 {
@@ -10,6 +17,23 @@ using CoreOrlexTypes::VSubjectParametrised;
 using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
 
 using Document = VDocumentTest;
+
+TEST(DocumentInterface, IsWhatQmlCalls)
+{
+	const QMetaObject& rMeta = VRetargetSetup::staticMetaObject;
+	EXPECT_STREQ(rMeta.className(), "VRetargetSetup");
+	for (const char* const pSignature : {"CreateTargetSubject()", "LoadTargetSubjectURL(QUrl)",
+	         "SaveTargetSubjectURL(QUrl)", "AddTarget(int,int,bool,bool)", "RemoveTarget(int)", "CreateAllJoints()",
+	         "RemoveUnnecessaryJoints()", "UpdateTargets()"})
+	{
+		const int index = rMeta.indexOfMethod(pSignature);
+		ASSERT_NE(index, -1) << pSignature;
+		EXPECT_STREQ(rMeta.method(index).typeName(), "void");
+	}
+	const QMetaProperty property = rMeta.property(rMeta.indexOfProperty("jointSymmetry"));
+	EXPECT_TRUE(property.isWritable());
+	EXPECT_EQ(property.notifySignal().name(), "jointSymmetryChanged");
+}
 
 TEST_F(Document, JointSymmetryTellsOfChangesOnly)
 {
@@ -24,12 +48,25 @@ TEST_F(Document, JointSymmetryTellsOfChangesOnly)
 	EXPECT_EQ(m_Changes, 0);
 }
 
-TEST_F(Document, WithoutSubjectsThereIsNothingToGive)
+TEST_F(Document, CommandsOnNothingDoNothing)
 {
-	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0x8000000Au);
+	VLogRecorder log;
+	m_Document.CreateTargetSubject();
+	m_Document.AddTarget(0, 0, true, true);
+	m_Document.RemoveTarget(0);
+	m_Document.UpdateTargets();
+	m_Document.CreateAllJoints();
+	m_Document.RemoveUnnecessaryJoints();
+	m_Document.SetTargetScale(2.0);
+	m_Document.SetTargetRootIndex(5);
+	m_Document.SaveTargetSubjectURL(QUrl::fromLocalFile(QString::fromStdString((m_Folder / "a.qrr").string())));
 	EXPECT_EQ(m_Folder.Count(), 0);
+	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0x8000000Au);
+	EXPECT_EQ(m_Changes, 0);
+	EXPECT_EQ(log.Take(), "");
 	EXPECT_FALSE(m_Document.GetCurrentFrame());
 	EXPECT_FALSE(m_Document.GetFBXSkeleton());
+	EXPECT_EQ(m_Document.GetTargetScale(), 1.0);
 	CoreOrlexTypes::VSubject subject;
 	VSubjectParametrised parametrised;
 	VSubjectApplicationData data;
@@ -86,13 +123,18 @@ TEST_F(Document, AddTargetRows)
 	    {"both sides", 4, 4, true, "RightHand>hand_r LeftHand>hand_l ", ""},
 	    {"no partner on either side", 0, 0, true, "Hips>pelvis ",
 	        "3 RetargetSetup: Segment 'Hips' of the source subject has no partner on the other side: no mirrored "
-	        "target "
-	        "is added\n"
-	        "3 RetargetSetup: Segment 'pelvis' of the target subject has no partner on the other side: no mirrored "
+	        "target is "
+	        "added\n3 RetargetSetup: Segment 'pelvis' of the target subject has no partner on the other side: no "
+	        "mirrored "
 	        "target is added"},
 	    {"no partner on one side", 1, 0, true, "LeftArm>pelvis ",
 	        "3 RetargetSetup: Segment 'pelvis' of the target subject has no partner on the other side: no mirrored "
-	        "target is added"},
+	        "target "
+	        "is added"},
+	    {"minus one", -1, 1, false, "", ""},
+	    {"beyond the source", 5, 1, false, "", ""},
+	    {"minus one for the target", 1, -1, true, "", ""},
+	    {"beyond the target", 1, 5, true, "", ""},
 	};
 	for (const auto& rRow : rows)
 	{
@@ -104,9 +146,20 @@ TEST_F(Document, AddTargetRows)
 		for (const auto& rTarget : m_Document.TargetValues().m_pApplicationData->m_Targets)
 			names += rTarget.m_Name + " ";
 		EXPECT_EQ(names, rRow.m_Targets);
-		EXPECT_EQ(m_Changes, 1);
+		EXPECT_EQ(m_Changes, rRow.m_Targets.empty() ? 0 : 1);
 		EXPECT_EQ(log.Take(), rRow.m_pTold);
 	}
+}
+
+TEST_F(Document, RemoveTargetOutOfRangeChangesNothing)
+{
+	SetSmallSubjects();
+	m_Document.AddTarget(1, 1, true, false);
+	m_Document.RemoveTarget(-1);
+	m_Document.RemoveTarget(1);
+	EXPECT_EQ(m_Changes, 1);
+	m_Document.RemoveTarget(0);
+	EXPECT_TRUE(Target().m_Targets.empty() && Target().m_Markers.empty());
 }
 
 TEST_F(Document, ATargetThatFitsNoClassDoesNotStopTheOthers)
@@ -120,6 +173,52 @@ TEST_F(Document, ATargetThatFitsNoClassDoesNotStopTheOthers)
 	m_Document.SetTargetSubject(subject, data);
 	m_Document.AddTarget(1, 1, true, false);
 	EXPECT_EQ(Target().m_Targets.size(), 2u);
+}
+
+TEST_F(Document, ABrokenTreeIsToldAndLeftAlone)
+{
+	SetSmallSubjects();
+	VSubjectParametrised subject = Target();
+	subject.m_Segments[1].m_ParentSegmentIndex = 3;
+	m_Document.SetTargetSubjectParametrised(subject);
+	VLogRecorder log;
+	m_Document.AddTarget(1, 1, true, false);
+	m_Document.UpdateTargets();
+	EXPECT_EQ(Target(), subject);
+	EXPECT_EQ(log.Take(),
+	    "3 RetargetSetup: The segments of the target subject make no tree with joints, so their poses are "
+	    "not known\n3 RetargetSetup: The segments of the target subject make no tree with joints, so "
+	    "their poses are not known");
+}
+
+TEST_F(Document, OffsetsFollowThePoseOnlyWhenUpdated)
+{
+	SetSmallSubjects();
+	m_Document.AddTarget(1, 1, true, false);
+	const auto offset = [this] { return Target().m_Targets.at(0).m_StateExpressions; };
+	const std::vector<std::string> first = {"150.000000*GlobalScale", "0.000000*GlobalScale", "200.000000*GlobalScale"};
+	EXPECT_EQ(offset(), first);
+	VSubjectParametrised subject = Target();
+	subject.m_Segments[0].m_Joint.m_BindPose = {0, 0, std::numbers::pi / 2, 0, 0, 100};
+	m_Document.SetTargetSubjectParametrised(subject);
+	EXPECT_EQ(offset(), first);
+	m_Document.UpdateTargets();
+	// The arm stands at (0, 150, 300) with X along world Y; the source's at (300, 0, 400).
+	EXPECT_EQ(offset(),
+	    (std::vector<std::string>{"-150.000000*GlobalScale", "-300.000000*GlobalScale", "100.000000*GlobalScale"}));
+}
+
+TEST_F(Document, TheNextScaleLeavesThePresentSubject)
+{
+	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
+	m_Document.CreateTargetSubject();
+	m_Changes = 0;
+	m_Document.SetNextTargetScale(3.0);
+	m_Document.SetNextTargetScale(0.0);
+	EXPECT_EQ(m_Changes, 0);
+	EXPECT_EQ(m_Document.GetTargetScale(), 1.0);
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(m_Document.GetTargetScale(), 3.0);
 }
 
 TEST_F(Document, TheOperatorIsToldWhichSourceASavedFileNames)
@@ -175,13 +274,7 @@ TEST_F(Document, TheScale)
 		EXPECT_EQ(m_Document.GetTargetScale(), 2.0);
 		EXPECT_EQ(log.Take().find("3 RetargetSetup: A scale must be a finite number above 0, not "), 0u);
 	}
-	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
-	m_Document.SetNextTargetScale(3.0);
-	m_Document.SetNextTargetScale(0.0);
-	EXPECT_EQ(m_Document.GetTargetScale(), 2.0) << "the next subject's";
 	EXPECT_EQ(m_Changes, 0);
-	m_Document.CreateTargetSubject();
-	EXPECT_EQ(m_Document.GetTargetScale(), 3.0);
 }
 
 TEST_F(Document, PruningTellsHowFarThePoseWent)
@@ -208,6 +301,20 @@ TEST_F(Document, PruningTellsHowFarThePoseWent)
 	    << told;
 	m_Document.CreateAllJoints();
 	EXPECT_EQ(Target().m_Segments[1].m_Joint.m_JointType, VJoint::EBall);
+}
+
+TEST_F(Document, CallbacksThroughADispatcherReadWhatStandsWhenTheyRun)
+{
+	SetSmallSubjects();
+	std::string names;
+	m_Document.GetChangedSignal().Connect([&]
+	    { names += m_Document.GetSourceName() + std::to_string(Target().m_Targets.size()) + ";"; },
+	    m_Host.GetDispatcher());
+	m_Document.AddTarget(1, 1, true, false);
+	m_Document.AddTarget(1, 1, true, false);
+	EXPECT_EQ(names, "");
+	m_Host.Dispatcher().RunPending();
+	EXPECT_EQ(names, "2;2;");
 }
 
 TEST_F(Document, AManyStepDragKeepsOneFrameAlive)

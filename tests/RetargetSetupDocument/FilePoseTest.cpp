@@ -112,6 +112,19 @@ TEST(FilePose, MatchingReachesPoseAndLengths)
 	}
 }
 
+TEST(FilePose, MatchingTurnsSegmentsWithoutAJointByTheirPreRotation)
+{
+	const FBXIO::VSkinSkeleton bones = ScaledArm();
+	VSubjectParametrised subject = BuildScaled(bones, 1.0);
+	CoreOrlexQRTIO::VSubjectQRTExtras extras;
+	subject.m_Targets.emplace_back().m_SegmentIndices = {2};
+	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
+	const RetargetSetup::VFileMatch match = RetargetSetup::MatchFilePose(subject, bones, YUp());
+	EXPECT_EQ(match.m_PreRotations, std::vector<std::size_t>{1});
+	EXPECT_TRUE(subject.m_Segments[1].m_Joint.m_BindPose.empty());
+	EXPECT_FALSE(RetargetSetup::WorstPoseDifference(RetargetSetup::PosesInFile(bones, YUp(), 1.0), BindPoses(subject)));
+}
+
 TEST(FilePose, MatchingAnotherSkeletonChangesNothing)
 {
 	VSubjectParametrised subject = BuildScaled(ScaledArm(), 1.0);

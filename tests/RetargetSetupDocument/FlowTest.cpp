@@ -1,23 +1,107 @@
-// The document on files.
+// The document from end to end on files: an FBX file and a performer in, a retarget subject out and in again.
 
+#include "CoreOrlexQRTIO/FileDifference.h"
 #include "TestDocument.h"
 
 #include "CoreOrlexTypes/SubjectRecord.h"
 #include "CoreOrlexTypes/TextForm.h"
 #include "RetargetSetupDocument/FilePath.h"
 
+#include <algorithm>
 #include <limits>
+#include <sstream>
 
 namespace
 {
 
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
+using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
 
 const boost::filesystem::path c_Demo = RETARGET_SOURCE "/demo";
 const boost::filesystem::path c_Cases = RETARGET_TEST_DATA "/fbx/cases";
 
-using Flow = VDocumentTest;
+int IndexOf(const VSubjectParametrised& i_rSubject, const std::string& i_rName)
+{
+	const auto found = std::find_if(i_rSubject.m_Segments.begin(), i_rSubject.m_Segments.end(),
+	    [&i_rName](const auto& i_rSegment) { return i_rSegment.m_Name == i_rName; });
+	return found == i_rSubject.m_Segments.end() ? -1 : int(found - i_rSubject.m_Segments.begin());
+}
+
+class Flow : public VDocumentTest
+{
+protected:
+	/// The pairs of the demo's mapping file, through the commands that QML calls.
+	void AddDemoTargets()
+	{
+		std::stringstream mapping(Get(c_Demo / "mapping.txt"));
+		VSubjectParametrised source;
+		ASSERT_TRUE(m_Document.GetSourceSubject(source));
+		bool bSymmetry = false;
+		for (std::string option, pair; mapping >> option;)
+		{
+			if (option == "--symmetry" || option == "--no-symmetry")
+			{
+				bSymmetry = option == "--symmetry";
+				continue;
+			}
+			mapping >> pair;
+			const std::size_t colon = pair.find(':');
+			const int sourceIndex = IndexOf(source, pair.substr(0, colon));
+			const int targetIndex = IndexOf(Target(), pair.substr(colon + 1));
+			ASSERT_TRUE(sourceIndex >= 0 && targetIndex >= 0) << pair;
+			QMetaObject::invokeMethod(&m_Document, "AddTarget", Q_ARG(int, sourceIndex), Q_ARG(int, targetIndex),
+			    Q_ARG(bool, option == "--position"), Q_ARG(bool, bSymmetry));
+		}
+	}
+};
+
+TEST_F(Flow, FromFBXToASavedSubjectAndBack)
+{
+	ASSERT_TRUE(m_Document.LoadSourceSubject(c_Demo / "performer.qrs", "Actor"));
+	EXPECT_EQ(m_Document.GetSourceName(), "performer");
+	EXPECT_EQ(m_Document.SourceValues().m_pApplicationData->m_Skin, "Actor");
+	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Demo / "character.fbx"));
+	EXPECT_TRUE(m_Document.IsTargetFBXComplete());
+	EXPECT_FALSE(m_Document.TargetValues().m_pParametrised) << "nothing is made before it is asked for";
+	m_Document.CreateTargetSubject();
+	EXPECT_EQ(Target().m_Segments.size(), 39u);
+	EXPECT_EQ(Target().m_SubjectId, 0x0FFFFFFFu);
+
+	AddDemoTargets();
+	EXPECT_EQ(Target().m_Targets.size(), 34u);
+	m_Document.RemoveUnnecessaryJoints();
+	m_Document.UpdateTargets();
+	const VSubjectParametrised pruned = Target();
+	const auto jointCount = std::count_if(pruned.m_Segments.begin(), pruned.m_Segments.end(),
+	    [](const auto& i_rSegment) { return i_rSegment.m_Joint.m_JointType != VJoint::EDummy; });
+	EXPECT_GT(jointCount, 10);
+	EXPECT_LT(jointCount, 39);
+
+	const boost::filesystem::path file = m_Folder / "Kästrel.v1.qrr";
+	const QUrl url = QUrl::fromLocalFile(QString::fromStdString(file.string()));
+	m_Document.SaveTargetSubjectURL(url);
+	const std::string bytes = Get(file);
+	ASSERT_FALSE(bytes.empty());
+
+	VRetargetSetup other(m_Host.GetDispatcher(), m_Host.GetFrameFactory(), m_Host.GetItemFactory());
+	other.LoadTargetSubjectURL(url);
+	EXPECT_EQ(other.GetSourceName(), "performer");
+	VSubjectParametrised subject;
+	VSubjectApplicationData data;
+	ASSERT_TRUE(other.GetTargetSubjectAndData(subject, data));
+	EXPECT_EQ(data.m_Skin, "character");
+	const VSubjectApplicationData& rSavedData = *m_Document.TargetValues().m_pApplicationData;
+	EXPECT_EQ(CoreOrlexQRTIO::FileDifference({Target(), rSavedData}, {subject, data}), "");
+
+	ASSERT_EQ(other.SaveTargetSubject(m_Folder / "again.qrr"), 0u);
+	EXPECT_EQ(Get(m_Folder / "again.qrr"), bytes);
+	// Edits go on where the file left off.
+	ASSERT_TRUE(other.LoadSourceSubject(c_Demo / "performer.qrs", ""));
+	other.UpdateTargets();
+	ASSERT_TRUE(other.GetTargetSubject(subject));
+	EXPECT_EQ(CoreOrlexQRTIO::FileDifference({Target(), data}, {subject, data}), "");
+}
 
 TEST_F(Flow, TheRootTakesItsPlaceInAWorldWithZUp)
 {
@@ -125,6 +209,8 @@ TEST_F(Flow, FilesThatCannotBeReadChangeNothing)
 	for (const auto& [path, status] : rows)
 		EXPECT_EQ(m_Document.LoadTargetSubject(path), status) << path;
 	EXPECT_FALSE(m_Document.LoadSourceSubject(m_Folder / "text.qrr", ""));
+	m_Document.LoadTargetSubjectURL(QUrl("http://example.com/a.qrr"));
+	m_Document.LoadTargetSubjectURL(QUrl());
 	EXPECT_EQ(m_Document.TargetValues().m_pParametrised, before.m_pParametrised);
 	EXPECT_EQ(m_Document.GetSourceName(), "");
 	EXPECT_EQ(m_Changes, 0);

@@ -40,6 +40,14 @@ void Prune(VSubjectParametrised& io_rSubject)
 	RemoveJointsWithoutTargets(io_rSubject, extras);
 }
 
+TEST(EnableJoint, LeavesAJointThatIsThere)
+{
+	VSubjectParametrised subject = Chain();
+	subject.m_Segments[1].m_Joint.m_BindPose = {0.1, 0.2, 0.3};
+	EnableJoint(subject, 1, {9, 9, 9});
+	EXPECT_EQ(subject.m_Segments[1].m_Joint.m_BindPose, (std::vector<double>{0.1, 0.2, 0.3}));
+}
+
 TEST(RemoveJoints, OnlyATargetOfItsOwnKeepsAJoint)
 {
 	const struct
@@ -69,10 +77,8 @@ TEST(RemoveJoints, BakesTheBindPoseBeforeThePreRotation)
 	VSubjectParametrised subject = Chain();
 	// Bind pose a quarter about X, pre-rotation a quarter about Z. X after Z takes X to Z, Y to -X and Z to -Y: a third
 	// of a turn about (1, -1, 1) / sqrt 3. The other order would give the axis (1, 1, 1).
-	// What is missing of a bind pose counts as zeros.
-	subject.m_Segments[1].m_Joint.m_BindPose = {std::numbers::pi / 2};
+	subject.m_Segments[1].m_Joint.m_BindPose = {std::numbers::pi / 2, 0, 0};
 	subject.m_Segments[1].m_PreRotation = {"0", "0", "1.5707963267948966"};
-	subject.m_Segments[2].m_Joint.m_BindPose.clear();
 	subject.m_Segments[2].m_PreRotation = {"1+1", "0.25", "2x"};
 	subject.m_Segments[3].m_Joint.m_JointType = VJoint::EFree;
 	subject.m_Segments[3].m_Joint.m_BindPose = {1, 1, 1, 5, 5, 5};
@@ -88,6 +94,16 @@ TEST(RemoveJoints, BakesTheBindPoseBeforeThePreRotation)
 		EXPECT_EQ(rJoint.m_JointType, VJoint::EDummy);
 		EXPECT_TRUE(rJoint.m_Mean.empty() && rJoint.m_BindPose.empty() && rJoint.m_Covariance.empty());
 	}
+}
+
+TEST(RemoveJoints, AShortBindPoseCountsAsZeros)
+{
+	VSubjectParametrised subject = Chain();
+	subject.m_Segments[1].m_Joint.m_BindPose = {0.5};
+	subject.m_Segments[2].m_Joint.m_BindPose.clear();
+	Prune(subject);
+	EXPECT_EQ(subject.m_Segments[1].m_PreRotation[0], "0.500000");
+	EXPECT_EQ(subject.m_Segments[2].m_PreRotation[0], "0.000000");
 }
 
 TEST(RemoveJoints, CreatingThemAgainGivesFreshOnes)

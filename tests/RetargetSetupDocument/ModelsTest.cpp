@@ -2,7 +2,7 @@
 #include "RetargetSetupDocument/RetargetSetupSegmentModel.h"
 #include "RetargetSetupDocument/RetargetSetupTargetModel.h"
 #include "RetargetSetupDocument/RoleNames.h"
-#include "TestSubjects.h"
+#include "TestDocument.h"
 
 #include <QAbstractItemModelTester>
 #include <QCoreApplication>
@@ -120,13 +120,12 @@ TEST(TargetModel, RolesOfEachType)
 	subject.m_Targets[3].m_SegmentIndices = {9};
 	subject.m_Targets[3].m_RotationObservationIndices = {1};
 	VTargetModel model;
+	model.SetSubject(Shared(subject));
 	const auto text = [&model](int i_Row, int i_Role)
 	{
 		const QVariant value = model.data(model.index(i_Row, 0), i_Role);
 		return value.isValid() ? value.toString().toStdString() : "nothing";
 	};
-	EXPECT_EQ(text(0, VTargetModel::SourceSegment), "nothing") << "no subject";
-	model.SetSubject(Shared(subject));
 	const char* const expected[4][4] = {{"Hips", "arm", "Position", "0.5"}, {"Wrist", "arm", "Rotation", "1.5"},
 	    {"nothing", "arm", "nothing", "2.5"}, {"nothing", "nothing", "Rotation", "3.5"}};
 	for (int row = 0; row < 4; ++row)
@@ -166,6 +165,28 @@ TEST(TargetModel, KeepsRowsThatStay)
 	}
 }
 
+TEST(TargetModel, IsEmptyWithoutASubject)
+{
+	VWatched<VTargetModel> watched;
+	EXPECT_EQ(watched.m_Model.rowCount(), 0);
+	for (int role = VTargetModel::SourceSegment; role <= VTargetModel::SelectionItem; ++role)
+		EXPECT_FALSE(watched.m_Model.data(watched.m_Model.index(0, 0), role).isValid()) << role;
+}
+
+TEST(ListModels, NothingStandsBelowARow)
+{
+	VSegmentModel segments(VSegmentModel::EFlavour::ESource);
+	VTargetModel targets;
+	for (const auto pSubject = Shared(WithTargets(3));
+	     auto* const pModel : {static_cast<QAbstractItemModel*>(&segments), static_cast<QAbstractItemModel*>(&targets)})
+	{
+		pModel == &targets ? targets.SetSubject(pSubject) : segments.SetSubject(pSubject);
+		ASSERT_GT(pModel->rowCount(), 0);
+		EXPECT_EQ(pModel->rowCount(pModel->index(0, 0)), 0);
+		EXPECT_EQ(pModel->columnCount(pModel->index(0, 0)), 0);
+	}
+}
+
 TEST(ListModels, TheirRolesAreKnownToQml)
 {
 	int count = 1;
@@ -175,24 +196,83 @@ TEST(ListModels, TheirRolesAreKnownToQml)
 	const VSegmentModel segments(VSegmentModel::EFlavour::ESource);
 	const VTargetModel targets;
 	QQmlEngine engine;
-	QQmlComponent component(&engine);
-	const auto make = [&component](const QByteArray& i_rBody)
+	const struct
 	{
-		component.setData("import QtQml 2.0\nimport TesselPluginRetargetSetup 1.0\n" + i_rBody, QUrl("qrc:/roles.qml"));
-		return std::unique_ptr<QObject>(component.create());
+		const char* m_pRole;
+		int m_Value;
+	} rows[] = {
+	    {"RetargetSetupSegmentModel.Name", 257},
+	    {"RetargetSetupSegmentModel.SelectionItem", 258},
+	    {"RetargetSetupTargetModel.SourceSegment", 257},
+	    {"RetargetSetupTargetModel.TargetSegment", 258},
+	    {"RetargetSetupTargetModel.TargetType", 259},
+	    {"RetargetSetupTargetModel.Weight", 260},
+	    {"RetargetSetupTargetModel.SelectionItem", 261},
 	};
-	const auto pRoles = make("QtObject { property int segment: RetargetSetupSegmentModel.SelectionItem\n"
-	                         "property int target: RetargetSetupTargetModel.Weight }");
-	ASSERT_TRUE(pRoles) << component.errorString().toStdString();
-	EXPECT_EQ(pRoles->property("segment").toInt(), 258);
-	EXPECT_EQ(pRoles->property("target").toInt(), 260);
+	const auto make = [&engine](const std::string& i_rBody, QString& o_rError)
+	{
+		QQmlComponent component(&engine);
+		component.setData(
+		    QByteArray::fromStdString("import QtQml 2.0\nimport TesselPluginRetargetSetup 1.0\n" + i_rBody),
+		    QUrl("qrc:/roles.qml"));
+		std::unique_ptr<QObject> pObject(component.create());
+		o_rError = component.errorString();
+		return pObject;
+	};
+	QString error;
+	for (const auto& rRow : rows)
+	{
+		const auto pObject = make(std::string("QtObject { property int role: ") + rRow.m_pRole + " }", error);
+		ASSERT_TRUE(pObject) << error.toStdString();
+		EXPECT_EQ(pObject->property("role").toInt(), rRow.m_Value) << rRow.m_pRole;
+	}
 	for (const char* const pType : {"RetargetSetupSegmentModel", "RetargetSetupTargetModel"})
 	{
-		EXPECT_FALSE(make(QByteArray(pType) + " {}"));
-		EXPECT_TRUE(component.errorString().contains(
-		    "This type is only used to allow custom model role enums to be accessible from QML."))
-		    << component.errorString().toStdString();
+		EXPECT_FALSE(make(std::string(pType) + " {}", error));
+		EXPECT_TRUE(
+		    error.contains("This type is only used to allow custom model role enums to be accessible from QML."))
+		    << error.toStdString();
 	}
+}
+
+/// What the three models of a document emit when it publishes.
+class PublishedModels : public VDocumentTest
+{
+protected:
+	PublishedModels()
+	{
+		SetSmallSubjects();
+		for (int i = 0; i < 5; ++i)
+			m_Document.AddTarget(i, i, true, false);
+		QObject::connect(m_Document.GetSourceSegmentModel().get(), &QAbstractItemModel::modelReset,
+		    [this] { m_Told += "source reset;"; });
+		QObject::connect(m_Document.GetTargetSegmentModel().get(), &QAbstractItemModel::modelReset,
+		    [this] { m_Told += "target reset;"; });
+		const QAbstractItemModel* const pTargets = m_Document.GetTargetModel().get();
+		QObject::connect(pTargets, &QAbstractItemModel::modelReset, [this] { m_Told += "reset;"; });
+		QObject::connect(pTargets, &QAbstractItemModel::rowsRemoved,
+		    [this](const QModelIndex&, int i_First, int i_Last)
+		    { m_Told += "removed " + std::to_string(i_First) + "-" + std::to_string(i_Last) + ";"; });
+		QObject::connect(pTargets, &QAbstractItemModel::dataChanged,
+		    [this](const QModelIndex& i_rFirst, const QModelIndex& i_rLast)
+		    { m_Told += "changed " + std::to_string(i_rFirst.row()) + "-" + std::to_string(i_rLast.row()) + ";"; });
+	}
+
+	std::string m_Told;
+};
+
+TEST_F(PublishedModels, AnEqualSubjectLeavesTheTableAlone)
+{
+	m_Document.SetTargetSubjectParametrised(Target());
+	EXPECT_EQ(m_Told, "source reset;target reset;");
+}
+
+TEST_F(PublishedModels, RemovingATargetTakesTheLastRow)
+{
+	m_Document.RemoveTarget(2);
+	EXPECT_EQ(m_Told, "source reset;target reset;removed 4-4;changed 0-3;");
+	const auto pModel = m_Document.GetTargetModel();
+	EXPECT_EQ(pModel->data(pModel->index(2, 0), VTargetModel::SourceSegment).toString(), "LeftHand");
 }
 
 TEST(TargetModel, AnyDifferenceOfTheSubjectChangesTheData)

@@ -7,15 +7,17 @@ using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
 using NVX::CountedPointer;
 
-/// Refuses one flow type.
+/// Counts what it is asked for and refuses one flow type.
 class VRefusingItemFactory : public NVX::VCounted<TesselPluginInterface::IItemFactory>
 {
 public:
 	CountedPointer<TesselPluginInterface::IFlowItem> CreateItem(const std::string& i_rFlowType) override
 	{
+		m_Asked += i_rFlowType + " ";
 		return i_rFlowType == m_Refused ? nullptr : m_Factory.CreateItem(i_rFlowType);
 	}
 
+	std::string m_Asked;
 	std::string m_Refused;
 
 private:
@@ -30,9 +32,11 @@ class VRefusingFrameFactory : public NVX::VCounted<TesselPluginInterface::IFrame
 public:
 	CountedPointer<TesselPluginInterface::IFlowFrame> CreateFrame() override
 	{
+		++m_Asked;
 		return m_bRefuse ? nullptr : CountedPointer<TesselPluginInterface::IFlowFrame>(new InMemoryHost::VFlowFrame);
 	}
 
+	int m_Asked = 0;
 	bool m_bRefuse = false;
 };
 
@@ -43,6 +47,19 @@ protected:
 	const CountedPointer<VRefusingFrameFactory> m_pFrames{new VRefusingFrameFactory};
 	VRetargetSetup m_Document{std::make_shared<InMemoryHost::VDispatcher>(), m_pFrames, m_pItems};
 };
+
+TEST_F(RefusingHost, AChangeAsksForEachItemAndOneFrame)
+{
+	const VSubjectParametrised subject = MakeSubject({{"a", -1}});
+	m_Document.SetSourceSubject(subject, {});
+	EXPECT_EQ(m_pItems->m_Asked, "FlowSubject FlowSubjectParametrised FlowSubjectApplicationData ");
+	m_Document.SetTargetSubject(subject, {});
+	m_pItems->m_Asked.clear();
+	m_Document.SetTargetSubjectParametrised(subject);
+	EXPECT_EQ(m_pItems->m_Asked, "FlowSubjectForSolving FlowSubjectParametrisedForSolving ")
+	    << "the application data stays";
+	EXPECT_EQ(m_pFrames->m_Asked, 3);
+}
 
 TEST_F(RefusingHost, WithoutAnItemEverythingStaysAsItWas)
 {

@@ -109,6 +109,15 @@ TEST_F(RetargetTargets, ThePairTwiceSharesOneMarker)
 	EXPECT_EQ(m_Target.m_Targets[0].m_StateExpressions, m_Target.m_Targets[1].m_StateExpressions);
 }
 
+TEST_F(RetargetTargets, TheScaleComesOutOfAPosition)
+{
+	SetGlobalScale(m_Target, 2.0);
+	// The target's arm is at (0, -200, 900) now.
+	Add(1, 1, true);
+	EXPECT_EQ(m_Target.m_Targets.at(0).m_StateExpressions,
+	    (std::vector<std::string>{"100.000000*GlobalScale", "-15.000000*GlobalScale", "50.000000*GlobalScale"}));
+}
+
 TEST_F(RetargetTargets, WithoutADynamicParameterTheOffsetStaysZeroAndIsTold)
 {
 	m_Target.m_DynamicParameters.clear();

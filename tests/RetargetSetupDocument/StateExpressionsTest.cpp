@@ -13,11 +13,11 @@ using namespace RetargetSetup;
 using CoreOrlexTypes::VSubjectParametrised;
 using VTarget = CoreOrlexTypes::VSubjectParametrised::VTarget;
 
-VSubjectParametrised SubjectWithTarget(VTarget::ETargetType i_Type)
+VSubjectParametrised SubjectWithTarget(VTarget::ETargetType i_Type, double i_Scale = 2.0)
 {
 	VSubjectParametrised subject = MakeSubject({{"a", -1}});
 	subject.m_DynamicParameters.insert(subject.m_DynamicParameters.begin(), {"First", 0, 0, 100.0, false});
-	subject.m_DynamicParameters.back().m_Value = 2.0;
+	subject.m_DynamicParameters.back().m_Value = i_Scale;
 	auto& rParameter = subject.m_StaticParameters.emplace_back();
 	rParameter.m_Name = "Arm";
 	rParameter.m_UserValue = 0.5;
@@ -109,6 +109,15 @@ TEST(SetStateExpression, AShortListGrows)
 		EXPECT_EQ(subject.m_Targets[0].m_StateExpressions[2], "4.000000*GlobalScale");
 		EXPECT_EQ(subject.m_Targets[0].m_StateExpressions[1], length == 2 ? "y" : "0");
 	}
+}
+
+TEST(SetStateExpression, AScaleOfZeroGivesNoFiniteQuotient)
+{
+	VSubjectParametrised subject = SubjectWithTarget(VTarget::ELocalPointToWorldPoint, 0.0);
+	VLogRecorder log;
+	EXPECT_FALSE(SetStateExpression(subject, "1", 0, 0));
+	EXPECT_EQ(subject.m_Targets[0].m_StateExpressions[0], "x");
+	EXPECT_EQ(log.Take(), "3 RetargetSetup: State X of target 0 stays as it was: 1 over the scale 0 is not finite");
 }
 
 TEST(UpdateTargetState, APoseThatIsNotFiniteLeavesTheOffset)

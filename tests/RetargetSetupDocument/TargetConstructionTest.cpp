@@ -47,6 +47,13 @@ TEST(ExtractSubtree, Rows)
 		EXPECT_EQ(NamesAndParents(ExtractSubtree(rRow.m_rSkeleton, rRow.m_Root)), rRow.m_pExpected) << rRow.m_Root;
 }
 
+TEST(ExtractSubtree, OnlyTheRootLosesItsPlace)
+{
+	const VSkinSkeleton subtree = ExtractSubtree({MakeBone("a", -1, 1), MakeBone("b", 0, 2), MakeBone("c", 1, 3)}, 1);
+	EXPECT_TRUE(subtree[0].m_Local.isIdentity());
+	EXPECT_EQ(subtree[1].m_Local(0, 3), 3.0f);
+}
+
 TEST(StripNamespace, Rows)
 {
 	const std::pair<const char*, const char*> rows[] = {

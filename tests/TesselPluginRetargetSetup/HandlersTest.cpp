@@ -5,6 +5,10 @@
 #include "OrlexGraphics/SkinCache.h"
 #include "TesselDataStore/StoredValue.h"
 
+#include <QTest>
+
+#include <limits>
+
 namespace
 {
 
@@ -63,13 +67,9 @@ TEST_F(Handlers, ShowingATargetRewritesNothing)
 	const auto pBefore = m_pDocument->TargetValues().m_pParametrised;
 	Select(NVX::ESelectionTarget, 0);
 	EXPECT_EQ(Shown(), (std::vector<std::string>{"0.5", "0.5", "-2", "1"})) << "numbers, and a weight below the limit";
-	for (const auto& [index, bHidden] : {std::pair<std::uint32_t, bool>{1, true}, {2, false}, {1, true}, {0, false}})
-	{
-		Select(NVX::ESelectionTarget, index);
-		for (const char* const pKey : {"TargetStateExpressionX", "TargetStateExpressionY", "TargetStateExpressionZ"})
-			EXPECT_EQ(Parameter(pKey).GetFlags(), bHidden ? std::uint32_t(IParameter::EHidden) : 0u) << index << pKey;
-		EXPECT_EQ(Parameter("TargetWeight").GetFlags(), 0u);
-	}
+	Select(NVX::ESelectionTarget, 1);
+	Select(NVX::ESelectionTarget, 2);
+	Select(NVX::ESelectionTarget, 0);
 	m_Context.SelectionManager().Selection().Replace({});
 	Run();
 	EXPECT_EQ(m_Changes, 0);
@@ -82,6 +82,18 @@ TEST_F(Handlers, ShowingATargetRewritesNothing)
 	Select(NVX::ESelectionTarget, 0);
 	EXPECT_EQ(Shown(), (std::vector<std::string>{"0.5", "24.5", "0", "0.10000000000000001"}));
 	EXPECT_EQ(Target(), subject);
+}
+
+TEST_F(Handlers, StatesAreHiddenForRotationsOnly)
+{
+	OpenWithTargets();
+	for (const auto& [index, bHidden] : {std::pair<int, bool>{1, true}, {0, false}, {1, true}, {2, false}})
+	{
+		Select(NVX::ESelectionTarget, std::uint32_t(index));
+		for (const char* const pKey : {"TargetStateExpressionX", "TargetStateExpressionY", "TargetStateExpressionZ"})
+			EXPECT_EQ(Parameter(pKey).GetFlags(), bHidden ? std::uint32_t(IParameter::EHidden) : 0u) << index << pKey;
+		EXPECT_EQ(Parameter("TargetWeight").GetFlags(), 0u);
+	}
 }
 
 TEST_F(Handlers, OnlyWhatIsTypedReachesTheTarget)
@@ -169,10 +181,14 @@ TEST_F(Handlers, ScaleFollowsTheFileAndKeepsItsParameters)
 	EXPECT_EQ(Target().m_DynamicParameters.size(), 2u) << "nor does typing the same";
 	EXPECT_EQ(TakeLog(), "");
 
-	EXPECT_EQ(Type("TargetScale", "-1"), "");
-	EXPECT_EQ(Text("TargetScale"), "1.5");
-	EXPECT_EQ(Target().m_DynamicParameters.size(), 2u);
-	EXPECT_NE(TakeLog().find("A scale must be a finite number above 0"), std::string::npos);
+	for (const double refused : {0.0, -1.0, std::numeric_limits<double>::infinity()})
+	{
+		Parameter("TargetScale").SetValue(ToVariant(refused));
+		Run();
+		EXPECT_EQ(Text("TargetScale"), "1.5") << refused;
+		EXPECT_EQ(Target().m_DynamicParameters.size(), 2u);
+		EXPECT_NE(TakeLog().find("A scale must be a finite number above 0"), std::string::npos);
+	}
 
 	m_pDocument->CreateTargetSubject();
 	Run();
@@ -299,6 +315,61 @@ TEST_F(Handlers, SkinsAreLookedForInTheUsersFolder)
 	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "none");
 	Run();
 	EXPECT_EQ(status("dragon"), OrlexGraphics::SkinStatus::c_NotFound);
+}
+
+TEST_F(Handlers, ChoicesFollowTheDiskAndNothingElseMoves)
+{
+	const fs::path anna = Copy(c_DemoSource, "subjects/anna.qrs");
+	Copy(c_DemoFBX, "skins/dragon.fbx");
+	m_Context.Folders().SetFolder("FolderSubjects", m_Folder / "subjects");
+	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "skins");
+	Open();
+	EXPECT_EQ(Type("SourceSkeleton", "anna"), "");
+	EXPECT_EQ(Type("TargetFBX", "dragon"), "");
+	m_pDocument->CreateTargetSubject();
+	Run();
+	const auto names = [this](const char* i_pKey)
+	{
+		std::string text;
+		for (const TesselPluginInterface::VEnumEntry& rEntry : Parameter(i_pKey).GetEnumeration())
+			text += rEntry.m_Name + " ";
+		return text;
+	};
+	const auto becomes = [&](const char* i_pKey, const std::string& i_rNames)
+	{
+		return QTest::qWaitFor(
+		    [&]
+		    {
+			    Run();
+			    return names(i_pKey) == i_rNames;
+		    },
+		    60000);
+	};
+	m_pDocument->GetChangedSignal().Connect([this] { ++m_Changes; });
+	fs::copy_file(anna, m_Folder / "subjects/bea.qrs");
+	EXPECT_TRUE(becomes("SourceSkeleton", "anna bea ")) << names("SourceSkeleton");
+	fs::rename(m_Folder / "subjects/bea.qrs", m_Folder / "subjects/zoe.qrs");
+	EXPECT_TRUE(becomes("SourceSkeleton", "anna zoe ")) << names("SourceSkeleton");
+	EXPECT_EQ(Text("SourceSkeleton"), anna.string());
+	fs::remove(m_Folder / "skins/dragon.fbx");
+	EXPECT_TRUE(becomes("TargetFBX", "(None) ")) << names("TargetFBX");
+	EXPECT_EQ(Text("TargetFBX"), "");
+	EXPECT_TRUE(m_pDocument->GetFBXSkeleton()) << "what was read of it stays";
+	EXPECT_EQ(Text("SourceSkeleton"), anna.string());
+	EXPECT_EQ(m_Changes, 0);
+}
+
+TEST_F(Handlers, EndWithThePanel)
+{
+	OpenDemo();
+	Parameter("TargetScale").SetValue(ToVariant(4.0));
+	m_pDocument->CreateTargetSubject();
+	m_pWidget.reset();
+	Run();
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 1.0) << "what was posted finds nobody";
+	m_pDocument->CreateTargetSubject();
+	m_Context.Folders().SetFolder("FolderSubjects", "/");
+	Run();
 }
 
 } // namespace

@@ -20,16 +20,33 @@ namespace
 
 using TesselPluginInterface::IPlugin;
 
-TEST(Module, GoesThroughALifeInTheHost)
+class Module : public testing::Test
 {
-	void* const pModule = dlopen(RETARGET_MODULE, RTLD_NOW | RTLD_LOCAL);
-	ASSERT_TRUE(pModule) << dlerror();
-	const auto pCreate = reinterpret_cast<VCreatePlugin*>(dlsym(pModule, "CreatePlugin"));
-	const auto pDestroy = reinterpret_cast<VDestroyPlugin*>(dlsym(pModule, "DestroyPlugin"));
-	const auto pRevision = reinterpret_cast<VPluginBuildRevision*>(dlsym(pModule, "PluginBuildRevision"));
-	ASSERT_TRUE(pCreate && pDestroy && pRevision);
-	EXPECT_EQ(pRevision(), 125783u);
-	pDestroy(nullptr);
+protected:
+	void SetUp() override
+	{
+		m_pModule = dlopen(RETARGET_MODULE, RTLD_NOW | RTLD_LOCAL);
+		ASSERT_TRUE(m_pModule) << dlerror();
+		m_pCreate = reinterpret_cast<VCreatePlugin*>(dlsym(m_pModule, "CreatePlugin"));
+		m_pDestroy = reinterpret_cast<VDestroyPlugin*>(dlsym(m_pModule, "DestroyPlugin"));
+		m_pRevision = reinterpret_cast<VPluginBuildRevision*>(dlsym(m_pModule, "PluginBuildRevision"));
+		ASSERT_TRUE(m_pCreate && m_pDestroy && m_pRevision);
+	}
+
+	void* m_pModule = nullptr;
+	VCreatePlugin* m_pCreate = nullptr;
+	VDestroyPlugin* m_pDestroy = nullptr;
+	VPluginBuildRevision* m_pRevision = nullptr;
+};
+
+TEST_F(Module, TellsItsRevisionAndTakesNoPlugin)
+{
+	EXPECT_EQ(m_pRevision(), 125783u);
+	m_pDestroy(nullptr);
+}
+
+TEST_F(Module, GoesThroughALifeInTheHost)
+{
 	const auto expectAgreement = [](IPlugin& i_rPlugin)
 	{
 		EXPECT_TRUE(i_rPlugin.FirstText().empty() && i_rPlugin.SecondText().empty());
@@ -42,7 +59,7 @@ TEST(Module, GoesThroughALifeInTheHost)
 		std::optional<VTestContext> context(std::in_place);
 		std::optional<VTestGui> gui(std::in_place, *context);
 		const std::weak_ptr<TesselPluginInterface::IDispatcher> pDispatcher = context->GetDispatcher();
-		IPlugin* const pPlugin = pCreate();
+		IPlugin* const pPlugin = m_pCreate();
 		ASSERT_TRUE(pPlugin);
 		expectAgreement(*pPlugin);
 		EXPECT_TRUE(pPlugin->RegisterQmlTypes());
@@ -58,13 +75,32 @@ TEST(Module, GoesThroughALifeInTheHost)
 		delete rPanel.m_pWidget;
 		EXPECT_TRUE(pPlugin->ReleaseContent());
 		EXPECT_TRUE(pPlugin->ReleaseContent());
-		pDestroy(pPlugin);
+		m_pDestroy(pPlugin);
 		RunAll(*context);
 		EXPECT_EQ(gui->m_pEngine->m_Warnings.join('\n').toStdString(), "");
 		gui.reset();
 		context.reset();
 		EXPECT_TRUE(pDispatcher.expired()) << "the module keeps nothing of the host";
 	}
+}
+
+TEST_F(Module, ComesAndGoesAHundredTimes)
+{
+	VTestContext context;
+	VTestGui gui(context);
+	for (int life = 0; life < 100; ++life)
+	{
+		IPlugin* const pPlugin = m_pCreate();
+		ASSERT_TRUE(pPlugin->RegisterQmlTypes() && pPlugin->CreateContent(context, gui));
+		ASSERT_EQ(gui.PanelManager().Panels().size(), std::size_t(life + 1));
+		delete gui.PanelManager().Panels().back().m_pWidget;
+		EXPECT_TRUE(pPlugin->ReleaseContent());
+		m_pDestroy(pPlugin);
+	}
+	// What the panels had posted finds none of them.
+	context.Folders().SetFolder("FolderSubjects", "/");
+	RunAll(context);
+	EXPECT_EQ(gui.m_pEngine->m_Warnings.join('\n').toStdString(), "");
 }
 
 TEST(ModuleFile, ShowsItsThreeFunctionsAndItsClassOnly)

@@ -265,10 +265,17 @@ TEST_F(Panel, TakesCommandsBeforeItsQmlIsThere)
 	m_pGui->m_pEngine->m_Warnings.clear();
 }
 
-TEST_F(Panel, ShowsTheFolderToItsQml)
+TEST_F(Panel, ShowsTheDocumentToItsQml)
 {
 	m_Context.Folders().SetFolder("FolderRetargets", m_Folder.Path());
 	Open();
+	const std::pair<const char*, QObject*> objects[] = {{"FlowScene", m_pScene.get()},
+	    {"ContextRetargetSetup", m_pDocument.get()}, {"RetargetSetupSelection", m_pSelection.get()},
+	    {"SourceSegmentModel", m_pDocument->GetSourceSegmentModel().get()},
+	    {"TargetSegmentModel", m_pDocument->GetTargetSegmentModel().get()},
+	    {"TargetModel", m_pDocument->GetTargetModel().get()}};
+	for (const auto& [pName, pObject] : objects)
+		EXPECT_EQ(m_pWidget->contextProperty(pName).value<QObject*>(), pObject) << pName;
 	EXPECT_EQ(m_pWidget->contextProperty("FocusSelection"), QVariant(false));
 	EXPECT_EQ(m_pWidget->contextProperty("MouseOver"), QVariant(true));
 	EXPECT_EQ(m_pWidget->contextProperty("ContextRetargetsUrl").toUrl(),
@@ -290,6 +297,9 @@ TEST_F(Panel, AddsAndRemovesTargetsOfTheSelection)
 	Click("addPositionTarget");
 	Click("addRotationTarget");
 	ASSERT_EQ(Target().m_Targets.size(), 2u);
+	EXPECT_EQ(Target().m_Targets[0].m_Type, CoreOrlexTypes::VSubjectParametrised::VTarget::ELocalPointToWorldPoint);
+	EXPECT_EQ(
+	    Target().m_Targets[1].m_Type, CoreOrlexTypes::VSubjectParametrised::VTarget::ELocalRotationToWorldRotation);
 	EXPECT_FALSE(Property("removeTarget", "enabled").toBool());
 	Select(NVX::ESelectionTarget, 1);
 	EXPECT_TRUE(Property("removeTarget", "enabled").toBool());

@@ -46,6 +46,16 @@ protected:
 		Frame();
 	}
 
+	std::uint32_t IndexOf(const std::string& i_rName) const
+	{
+		const auto segments = Target().m_Segments;
+		for (std::uint32_t i = 0; i < segments.size(); ++i)
+			if (segments[i].m_Name == i_rName)
+				return i;
+		ADD_FAILURE() << i_rName;
+		return 0;
+	}
+
 	/// As the last frame has it.
 	QMatrix4x4 World(std::uint32_t i_Index) const
 	{
@@ -62,6 +72,15 @@ protected:
 	OrlexGraphics::VFrameRenderer m_Renderer;
 	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 };
+
+float Distance(const QMatrix4x4& i_rA, const QMatrix4x4& i_rB)
+{
+	float largest = 0.0f;
+	for (int row = 0; row < 4; ++row)
+		for (int column = 0; column < 4; ++column)
+			largest = std::max(largest, std::abs(i_rA(row, column) - i_rB(row, column)));
+	return largest;
+}
 
 TEST_F(Scene, ShowsTheManipulatorAtTheSelectedSegment)
 {
@@ -86,6 +105,35 @@ TEST_F(Scene, ShowsTheManipulatorAtTheSelectedSegment)
 	EXPECT_FALSE(Manipulator().IsVisible()) << "its joint was removed";
 	SelectSegment(100000);
 	EXPECT_FALSE(Manipulator().IsVisible()) << "no such segment";
+}
+
+TEST_F(Scene, SegmentsStandWhereTheManipulatorIsDragged)
+{
+	SelectSegment(0);
+	QMatrix4x4 place = World(0);
+	place.setColumn(3, QVector4D(100, -200, 1000, 1));
+	place.rotate(30, 1, 2, 3);
+	Manipulator().ChangedSignal().Fire(place);
+	Run();
+	Frame();
+	EXPECT_LT(Distance(World(0), place), 1e-2f) << "the root turns and moves";
+
+	const std::uint32_t arm = IndexOf("collarLeft") + 1;
+	SelectSegment(arm);
+	const QMatrix4x4 before = World(arm);
+	QMatrix4x4 turned = before;
+	turned.rotate(40, 0, 1, 0);
+	Manipulator().ChangedSignal().Fire(turned);
+	Run();
+	Frame();
+	EXPECT_LT(Distance(World(arm), turned), 1e-2f);
+	EXPECT_EQ(Target().m_Segments[arm].m_Joint.m_Mean, Target().m_Segments[arm].m_Joint.m_BindPose);
+
+	turned.setColumn(3, QVector4D(0, 0, 0, 1));
+	Manipulator().ChangedSignal().Fire(turned);
+	Run();
+	Frame();
+	EXPECT_LT((World(arm).column(3) - before.column(3)).length(), 1e-2f) << "a limb does not leave its parent";
 }
 
 TEST_F(Scene, ConnectsTheManipulatorOnce)

@@ -49,4 +49,13 @@ TEST(Slots, StandInTheOrderThatHostsCallBy)
 #endif
 }
 
+TEST(Slots, ABarePluginAgreesToEverything)
+{
+	IPlugin plugin;
+	EXPECT_TRUE(plugin.FirstText().empty());
+	EXPECT_TRUE(plugin.SecondText().empty());
+	EXPECT_TRUE(plugin.FirstHook() && plugin.SecondHook() && plugin.ThirdHook() && plugin.FourthHook()
+	    && plugin.FifthHook() && plugin.RegisterQmlTypes() && plugin.ReleaseContent());
+}
+
 } // namespace

@@ -40,13 +40,15 @@ TEST(Options, WrongLines)
 	}
 }
 
-TEST(Options, HelpIsText)
+TEST(Options, HelpAndVersionAreText)
 {
 	std::string text;
 	EXPECT_FALSE(ParseOptions({"--help"}, text));
 	for (const char* pOption : {"--source", "--fbx", "--target", "--screenshot", "--size", "--module", "--settings",
 	         "--developer", "--version", "Exit status"})
 		EXPECT_NE(text.find(pOption), std::string::npos) << pOption;
+	EXPECT_FALSE(ParseOptions({"--version"}, text));
+	EXPECT_EQ(text, "retarget-studio " RETARGET_VERSION "\n");
 }
 
 TEST(Options, FilesInTheOrderOfTheirKinds)

@@ -76,7 +76,7 @@ TEST_F(Store, ComesBackInTheNextRun)
 	const auto pNext = std::make_shared<VDataStore>();
 	{
 		const StudioHost::VStoreFile file(m_Settings, pNext, m_pDispatcher);
-		EXPECT_EQ(messages.Take(), "3 Store: The settings' entry 'RetargetSetup/Odd' cannot be read and is left out");
+		EXPECT_EQ(messages.Take(), "Store: The settings' entry 'RetargetSetup/Odd' cannot be read and is left out\n");
 		const VDataReader reader(pNext);
 		EXPECT_EQ(
 		    reader.GetKeys({}), (std::vector<std::string>{"RetargetSetup/TargetRoot", "RetargetSetup/TargetScale"}));
@@ -94,8 +94,15 @@ TEST_F(Store, HoldsThePreferences)
 	std::vector<std::string> changed;
 	preferences.ChangedSignal().Connect([&](const std::string& i_rKey) { changed.push_back(i_rKey); });
 	EXPECT_EQ(preferences.Number(c_NavigationAltKey, 1), 1);
-	preferences.SetFolder("FolderSkins", "/folder");
+	for (const char* pKey : TesselPluginInterface::c_FolderKeys)
+	{
+		EXPECT_TRUE(preferences.Folder(pKey).empty());
+		preferences.SetFolder(pKey, "/folder");
+		EXPECT_EQ(preferences.Folder(pKey), "/folder") << pKey;
+	}
 	m_pDispatcher->RunPending();
+	EXPECT_EQ(
+	    std::vector<std::string>(changed.begin(), changed.end()).size(), TesselPluginInterface::c_FolderKeys.size());
 	changed.clear();
 
 	preferences.SetFolder("FolderSkins", "/folder");
@@ -112,9 +119,8 @@ TEST_F(Store, HoldsThePreferences)
 	VDataWriter(m_pStore).SetFloat64("FolderProps", 1.0);
 	EXPECT_TRUE(preferences.Folder("FolderProps").empty());
 	EXPECT_EQ(messages.Take(),
-	    "2 Store: Failed getting value for store entry 'FolderProps': the requested value type does not match the "
-	    "store "
-	    "value type.");
+	    "Store: Failed getting value for store entry 'FolderProps': the requested value type does not match the store "
+	    "value type.\n");
 }
 
 } // namespace

@@ -109,7 +109,7 @@ TEST_F(Window, TakesDroppedFilesByKind)
 	EXPECT_FALSE(Drop({note}));
 	EXPECT_TRUE(Drop({target, note, c_Fbx, c_Source}));
 	EXPECT_EQ(m_Messages.Take(),
-	    "2 Import: " + note.toStdString() + " is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx");
+	    "Import: " + note.toStdString() + " is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx\n");
 	EXPECT_EQ(Parameter("SourceSkeleton"), c_Source.toStdString());
 	EXPECT_EQ(Parameter("TargetFBX"), c_Fbx.toStdString());
 	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));
@@ -120,7 +120,7 @@ TEST_F(Window, TakesDroppedFilesByKind)
 	EXPECT_NE(m_Messages.Take().find("Command: LoadTargetSubjectURL did nothing: "), std::string::npos);
 	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));
 	EXPECT_TRUE(Drop({Path("gone.fbx")}));
-	EXPECT_EQ(m_Messages.Take(), "2 Import: " + Path("gone.fbx").toStdString() + " does not exist");
+	EXPECT_EQ(m_Messages.Take(), "Import: " + Path("gone.fbx").toStdString() + " does not exist\n");
 	EXPECT_EQ(RecentFiles().size(), 3);
 }
 
@@ -132,8 +132,6 @@ TEST_F(Window, OpensFilesUsedLast)
 	RunEvents();
 	Restart();
 	LoadPanel();
-	RunEvents();
-	EXPECT_EQ(Parameter("SourceSkeleton"), c_Source.toStdString()) << "what the panel was set to";
 	QMenu& rMenu = *m_pWindow->findChild<QMenu*>("RecentMenu");
 	ASSERT_GE(rMenu.actions().size(), 2);
 	EXPECT_EQ(rMenu.actions()[0]->text(), "&1  " + c_Fbx);
@@ -141,6 +139,17 @@ TEST_F(Window, OpensFilesUsedLast)
 	EXPECT_EQ(RecentFiles(), (QStringList{c_Source, c_Fbx}));
 	Action("ClearRecentFiles").trigger();
 	EXPECT_FALSE(rMenu.isEnabled());
+}
+
+TEST_F(Window, KeepsWhatThePanelWasSetTo)
+{
+	LoadPanel();
+	m_pWindow->Open(c_Source);
+	RunEvents();
+	Restart();
+	LoadPanel();
+	RunEvents();
+	EXPECT_EQ(Parameter("SourceSkeleton"), c_Source.toStdString());
 }
 
 TEST_F(Window, ExplainsSilentCommands)
@@ -153,10 +162,20 @@ TEST_F(Window, ExplainsSilentCommands)
 	QMetaObject::invokeMethod(pPanel->contextProperty("ContextRetargetSetup").value<QObject*>(), "CreateTargetSubject");
 	RunEvents();
 	const std::string message = m_Messages.Take();
-	EXPECT_EQ(message.find("3 Command: CreateTargetSubject did nothing: "), 0u) << message;
+	EXPECT_EQ(message.find("Command: CreateTargetSubject did nothing: "), 0u) << message;
 	const QAbstractItemModel& rLog = m_pWindow->Log();
 	const int last = rLog.rowCount() - 1;
 	EXPECT_EQ(rLog.index(last, StudioHost::VLogModel::ECategory).data().toString(), "Command");
+}
+
+TEST_F(Window, SaysWhyThereIsNoPanel)
+{
+	EXPECT_FALSE(m_pWindow->LoadModule(Path("None.so")));
+	const auto& rNotice = *m_pWindow->findChild<QLabel*>("Notice");
+	EXPECT_TRUE(rNotice.isVisible());
+	EXPECT_EQ(rNotice.text(), "No module is loaded: " + Path("None.so") + " does not exist");
+	Action("FrameSelected").trigger();
+	EXPECT_NE(m_Messages.Take().find("no panel knows the command"), std::string::npos);
 }
 
 TEST_F(Window, KeepsItsLayout)

@@ -5,6 +5,7 @@
 #include <QAccessible>
 #include <QFileInfo>
 #include <QQmlPropertyMap>
+#include <QQuickWidget>
 #include <QSignalSpy>
 #include <QTest>
 
@@ -13,6 +14,31 @@
 namespace
 {
 
+/// With a property as a document has it.
+class VDocument : public QObject
+{
+	Q_OBJECT
+	Q_PROPERTY(bool symmetry READ Symmetry WRITE SetSymmetry NOTIFY symmetryChanged)
+
+public:
+	bool Symmetry() const { return m_bSymmetry; }
+	void SetSymmetry(bool i_bSymmetry)
+	{
+		++m_WriteCount;
+		if (m_bRefuses || m_bSymmetry == i_bSymmetry)
+			return;
+		m_bSymmetry = i_bSymmetry;
+		emit symmetryChanged();
+	}
+
+	bool m_bSymmetry = false;
+	bool m_bRefuses = false;
+	int m_WriteCount = 0;
+
+signals:
+	void symmetryChanged();
+};
+
 QColor ColourAt(VQmlPage& i_rPage, const QPoint& i_rPoint)
 {
 	return i_rPage.View().grabWindow().pixelColor(i_rPoint);
@@ -20,10 +46,15 @@ QColor ColourAt(VQmlPage& i_rPage, const QPoint& i_rPoint)
 
 } // namespace
 
-TEST(Theme, TextCanBeRead)
+TEST(Theme, ColoursAndSizes)
 {
 	VQmlPage page;
 	ASSERT_TRUE(page.Show(R"(
+		property var colours: [Theme.window, Theme.windowText, Theme.base, Theme.text, Theme.dark, Theme.midlight,
+			Theme.light, Theme.mid, Theme.bright, Theme.highlight, Theme.active, Theme.disabledText, Theme.border,
+			Theme.button, Theme.buttonText, Theme.error, Theme.warning]
+		property var sizes: [Theme.itemHeight, Theme.spacing, Theme.margin, Theme.radius, Theme.fontSize,
+			Theme.infoToolTipDelay]
 		property color highlight: Theme.highlight
 		property color active: Theme.active
 		function contrast(first, second) {
@@ -35,6 +66,10 @@ TEST(Theme, TextCanBeRead)
 			contrast(Theme.buttonText, Theme.button), contrast(Theme.bright, Theme.light),
 			contrast(Theme.text, Theme.midlight), contrast(Theme.error, Theme.window), contrast(Theme.warning, Theme.button)))"));
 	const QQuickItem* const pRoot = page.View().rootObject();
+	for (const QVariant& rColour : pRoot->property("colours").value<QJSValue>().toVariant().toList())
+		EXPECT_TRUE(rColour.value<QColor>().isValid());
+	for (const QVariant& rSize : pRoot->property("sizes").value<QJSValue>().toVariant().toList())
+		EXPECT_GT(rSize.toInt(), 0);
 	EXPECT_EQ(pRoot->property("highlight").value<QColor>(), QColor(75, 120, 170));
 	EXPECT_EQ(pRoot->property("active").value<QColor>(), QColor(231, 101, 0));
 	// What the accessibility guidelines ask of large text, at the least.
@@ -121,6 +156,31 @@ TEST(Button, ToolTipUnderTheMouse)
 	EXPECT_FALSE(shows("Short"));
 }
 
+TEST(PropertyCheckBox, FollowsAndSetsAnObject)
+{
+	VDocument document;
+	VQmlPage page;
+	page.SetContext("document", &document);
+	ASSERT_TRUE(page.Show(
+	    R"(PropertyCheckBox { objectName: "box"; text: "Joint symmetry"; target: document; property: "symmetry" })"));
+	EXPECT_FALSE(page.Property("box", "checked").toBool());
+	page.Click("box");
+	EXPECT_TRUE(document.m_bSymmetry);
+	EXPECT_TRUE(page.Property("box", "checked").toBool());
+	// Still bound after a click.
+	document.SetSymmetry(false);
+	EXPECT_FALSE(page.Property("box", "checked").toBool());
+	page.Key(Qt::Key_Space);
+	EXPECT_TRUE(document.m_bSymmetry);
+
+	// A target that refuses has the last word.
+	document.m_bRefuses = true;
+	document.m_WriteCount = 0;
+	page.Click("box");
+	EXPECT_EQ(document.m_WriteCount, 1);
+	EXPECT_TRUE(page.Property("box", "checked").toBool());
+}
+
 TEST(PropertyCheckBox, FollowsAndSetsAPropertyMap)
 {
 	QQmlPropertyMap map;
@@ -128,10 +188,7 @@ TEST(PropertyCheckBox, FollowsAndSetsAPropertyMap)
 	QSignalSpy changes(&map, &QQmlPropertyMap::valueChanged);
 	VQmlPage page;
 	page.SetContext("map", &map);
-	ASSERT_TRUE(page.Show(R"(
-		Item { visible: false; Item { id: hidden } }
-		PropertyCheckBox { objectName: "box"; text: "Axes"; target: map; property: "Axes" }
-		PropertyCheckBox { objectName: "refused"; y: 40; text: "x"; target: hidden; property: "visible" })"));
+	ASSERT_TRUE(page.Show(R"(PropertyCheckBox { objectName: "box"; text: "Axes"; target: map; property: "Axes" })"));
 	EXPECT_FALSE(page.Property("box", "checked").toBool());
 	page.Click("box");
 	EXPECT_EQ(map.value("Axes"), true);
@@ -140,23 +197,21 @@ TEST(PropertyCheckBox, FollowsAndSetsAPropertyMap)
 	// From C++, which tells nobody but the bindings.
 	map.insert("Axes", false);
 	EXPECT_FALSE(page.Property("box", "checked").toBool());
-	page.Key(Qt::Key_Space);
+	page.Click("box");
 	EXPECT_EQ(map.value("Axes"), true);
 	EXPECT_EQ(changes.count(), 2);
-
-	// A target that refuses has the last word: what stands in a hidden item is not visible by itself.
-	page.Click("refused");
-	EXPECT_FALSE(page.Property("refused", "checked").toBool());
 }
 
 TEST(PropertyCheckBox, IsDisabledWithoutItsProperty)
 {
+	VDocument document;
 	VQmlPage page;
+	page.SetContext("document", &document);
 	ASSERT_TRUE(page.Show(R"(
 		Column {
 			PropertyCheckBox { objectName: "none"; text: "x" }
-			PropertyCheckBox { objectName: "null"; text: "x"; target: null; property: "width" }
-			PropertyCheckBox { objectName: "other"; text: "x"; target: page; property: "nothing" } })"));
+			PropertyCheckBox { objectName: "null"; text: "x"; target: null; property: "symmetry" }
+			PropertyCheckBox { objectName: "other"; text: "x"; target: document; property: "nothing" } })"));
 	for (const char* pName : {"none", "null", "other"})
 		EXPECT_FALSE(page.Property(pName, "enabled").toBool()) << pName;
 }
@@ -211,7 +266,6 @@ TEST(ComboBox, FiltersFiveThousand)
 			const names = []
 			for (let i = 0; i < 5000; ++i)
 				names.push(" ".repeat(i % 4) + (i % 2 ? "Left" : "Right") + "Bone" + i)
-			names[1] = "LeftBone2501Ctrl"
 			return names
 		}
 		OrlexComboBox { objectName: "box"; width: 200; currentIndex: 4321; model: page.names })"));
@@ -244,11 +298,6 @@ TEST(ComboBox, FiltersFiveThousand)
 	EXPECT_GT(page.Property("boxList", "currentIndex").toInt(), 1499 + 5);
 	page.Key(Qt::Key_Escape);
 	EXPECT_EQ(page.Property("box", "displayText"), "LeftBone1499");
-	// What is typed in full is meant, not what begins with it.
-	page.Type("leftbone2501");
-	EXPECT_EQ(rows(), 2);
-	page.Key(Qt::Key_Return);
-	EXPECT_EQ(page.Property("box", "displayText"), "LeftBone2501");
 }
 
 TEST(ComboBox, StaysInItsWindow)
@@ -283,6 +332,35 @@ TEST(ComboBox, ListFollowsItsModel)
 	EXPECT_EQ(page.Property("box", "displayText"), "");
 	page.Key(Qt::Key_Return);
 	EXPECT_EQ(page.Property("box", "displayText"), "x");
+}
+
+TEST(ComboBox, WorksInAWidget)
+{
+	QQmlEngine engine;
+	StudioHost::RegisterQmlModules(engine, {});
+	QQmlComponent component(&engine);
+	component.setData("import QtQuick 2.15\nimport Orlex.Controls 1.0\nItem { OrlexComboBox { id: box; width: 150\n"
+	                  "model: Array.from({length: 100}, (x, i) => \"Bone\" + i) }\n"
+	                  "property alias shown: box.displayText }",
+	    QUrl("qrc:/Page.qml"));
+	QQuickWidget widget(&engine, nullptr);
+	QObject* const pRoot = component.create();
+	ASSERT_TRUE(pRoot) << component.errorString().toStdString();
+	widget.setContent(QUrl("qrc:/Page.qml"), &component, pRoot);
+	widget.setResizeMode(QQuickWidget::SizeRootObjectToView);
+	widget.resize(400, 300);
+	widget.show();
+	widget.activateWindow();
+	ASSERT_TRUE(QTest::qWaitForWindowActive(&widget));
+	widget.setFocus();
+	QTest::mouseClick(&widget, Qt::LeftButton, {}, {30, 12});
+	QTest::keyClicks(&widget, "77");
+	QTest::keyClick(&widget, Qt::Key_Return);
+	EXPECT_EQ(pRoot->property("shown"), "Bone77");
+	QTest::mouseClick(&widget, Qt::LeftButton, {}, {30, 12});
+	QTest::keyClick(&widget, Qt::Key_Escape);
+	QTest::keyClick(&widget, Qt::Key_Down);
+	EXPECT_EQ(pRoot->property("shown"), "Bone78");
 }
 
 TEST(SplitView, ThreeColumnsAreDragged)
@@ -339,3 +417,5 @@ TEST(Modules, SourcesComeBeforeResources)
 	EXPECT_TRUE(QFileInfo(RETARGET_STUDIO_QML "/Orlex/Controls/OrlexButton.qml").isFile());
 	EXPECT_EQ(engine.importPathList().first(), QString(RETARGET_STUDIO_QML));
 }
+
+#include "ControlsTest.moc"

@@ -2,6 +2,8 @@
 
 #include "WindowFixture.h"
 
+#include "CoreOrlexQRTIO/Reader.h"
+#include "CoreOrlexTypes/TextForm.h"
 #include "studio/Services.h"
 
 #include <QFile>
@@ -12,6 +14,22 @@ namespace
 class Job : public Window
 {
 protected:
+	/// A subject of one target as programs of old wrote it.
+	QByteArray LegacyFile()
+	{
+		const QByteArray made = CommandLine({"create", "--fbx", File("character.fbx"), "--source",
+		    File("performer.qrs"), "--rotation", "Pelvis:haunch"});
+		CoreOrlexTypes::VSubjectRecord record;
+		CoreOrlexQRTIO::VSubjectQRTExtras extras;
+		std::vector<std::string> errors;
+		std::vector<std::string> warnings;
+		EXPECT_TRUE(CoreOrlexQRTIO::VReader().ReadText(made.toStdString(), "Template", 0x0FFFFFFFu,
+		    record.m_SubjectParametrised, record.m_SubjectApplicationData, extras, errors, warnings));
+		std::string text;
+		EXPECT_TRUE(CoreOrlexTypes::WriteText(record, text));
+		return "[[1,0,1],\"\"]" + QByteArray::fromStdString(text);
+	}
+
 	void SelectPair(const char* i_pSource, const char* i_pTarget)
 	{
 		m_pOperator->ClickRow("sourceSegments", RowOf("sourceSegments", i_pSource));
@@ -109,32 +127,40 @@ TEST_F(Job, SelectsWithMouseAndKeys)
 	VOperator& rOperator = *m_pOperator;
 	CreateTargetSubject();
 
-	const QString list = "sourceSegments";
-	const int last = rOperator.Property(list, "count").toInt() - 1;
-	const auto selected = [&] { return rOperator.Property(list, "selectedIndex").toInt(); };
-	rOperator.ClickRow(list, 3);
-	EXPECT_EVENTUALLY(selected() == 3);
-	rOperator.ClickRow(list, 5, Qt::ControlModifier);
-	EXPECT_EVENTUALLY(selected() == -1) << "two are selected";
-	rOperator.ClickRow(list, 3, Qt::ControlModifier);
-	EXPECT_EVENTUALLY(selected() == 5);
-	const std::pair<Qt::Key, int> keys[] = {{Qt::Key_Down, 6}, {Qt::Key_Up, 5}, {Qt::Key_End, last},
-	    {Qt::Key_Down, last}, {Qt::Key_Home, 0}, {Qt::Key_Up, 0}};
-	for (const auto& rKey : keys)
+	int other = -1;
+	for (const QString& rList : {QStringLiteral("sourceSegments"), QStringLiteral("targetSegments")})
 	{
-		rOperator.Key(rKey.first);
-		EXPECT_EVENTUALLY(selected() == rKey.second) << rKey.first;
-	}
-	auto& rPreSelection = m_pWindow->Context().GetSelectionManager()->PreSelection();
-	rOperator.Hover(list + "Row2");
-	EXPECT_EVENTUALLY(rPreSelection.Items().size() == 1 && rPreSelection.Items()[0].m_ElementIndex == 2);
-	EXPECT_EQ(selected(), 0) << "pointing at a row selects nothing";
-	rOperator.Hover("updateTargets");
-	EXPECT_EVENTUALLY(rPreSelection.Items().empty());
+		SCOPED_TRACE(rList.toStdString());
+		EXPECT_EVENTUALLY(rOperator.Property(rList, "count").toInt() > 20);
+		const int last = rOperator.Property(rList, "count").toInt() - 1;
+		const auto selected = [&] { return rOperator.Property(rList, "selectedIndex").toInt(); };
 
-	rOperator.ClickRow("targetSegments", 4);
-	EXPECT_EVENTUALLY(rOperator.Property("targetSegments", "selectedIndex").toInt() == 4);
-	EXPECT_EQ(selected(), 0) << "lists are apart";
+		rOperator.ClickRow(rList, 3);
+		EXPECT_EVENTUALLY(selected() == 3);
+		rOperator.ClickRow(rList, 5, Qt::ControlModifier);
+		EXPECT_EVENTUALLY(selected() == -1) << "two are selected";
+		rOperator.ClickRow(rList, 3, Qt::ControlModifier);
+		EXPECT_EVENTUALLY(selected() == 5);
+		const std::pair<Qt::Key, int> keys[] = {{Qt::Key_Down, 6}, {Qt::Key_Up, 5}, {Qt::Key_End, last},
+		    {Qt::Key_Down, last}, {Qt::Key_Home, 0}, {Qt::Key_Up, 0}};
+		for (const auto& rKey : keys)
+		{
+			rOperator.Key(rKey.first);
+			EXPECT_EVENTUALLY(selected() == rKey.second) << rKey.first;
+		}
+		auto& rPreSelection = m_pWindow->Context().GetSelectionManager()->PreSelection();
+		rOperator.Hover(rList + "Row2");
+		EXPECT_EVENTUALLY(rPreSelection.Items().size() == 1 && rPreSelection.Items()[0].m_ElementIndex == 2);
+		EXPECT_EQ(selected(), 0) << "pointing at a row selects nothing";
+		rOperator.Hover("updateTargets");
+		EXPECT_EVENTUALLY(rPreSelection.Items().empty());
+
+		if (other != -1)
+		{
+			EXPECT_EQ(rOperator.Property("sourceSegments", "selectedIndex").toInt(), other) << "lists are apart";
+		}
+		other = selected();
+	}
 	EXPECT_EVENTUALLY(rOperator.Property("addPositionTarget", "enabled").toBool());
 	rOperator.Click("jointSymmetry");
 	EXPECT_EVENTUALLY(!rOperator.Property("jointSymmetry", "checked").toBool());
@@ -145,10 +171,7 @@ TEST_F(Job, SelectsWithMouseAndKeys)
 TEST_F(Job, ALegacyFileIsSavedUnderANewName)
 {
 	VOperator& rOperator = *m_pOperator;
-	// A subject of one target as programs of old wrote it.
-	CommandLine(
-	    {"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--rotation", "Pelvis:haunch"});
-	const QByteArray legacy = "[[1,0,1],\"\"]" + Run({"dump", File("expected.qrr")});
+	const QByteArray legacy = LegacyFile();
 	QFile file(File("old.qrx"));
 	ASSERT_TRUE(file.open(QIODevice::WriteOnly) && file.write(legacy) == legacy.size());
 	file.close();

@@ -1,23 +1,36 @@
 #include "Operator.h"
 
-#include "../FindItem.h"
 #include "../WaitFor.h"
 
 #include <gtest/gtest.h>
 
 #include <QApplication>
+#include <QComboBox>
 #include <QFileDialog>
 #include <QLineEdit>
 #include <QQuickItem>
 #include <QQuickWidget>
 #include <QQuickWindow>
 #include <QScreen>
+#include <QTabBar>
+#include <QTabWidget>
 #include <QTest>
+#include <QTimer>
 #include <QWheelEvent>
 #include <QWindow>
 
 namespace
 {
+
+QQuickItem* Find(QQuickItem* i_pItem, const QString& i_rName, bool i_bVisible)
+{
+	if (i_pItem->objectName() == i_rName && (!i_bVisible || i_pItem->isVisible()))
+		return i_pItem;
+	for (QQuickItem* const pChild : i_pItem->childItems())
+		if (QQuickItem* const pFound = Find(pChild, i_rName, i_bVisible))
+			return pFound;
+	return nullptr;
+}
 
 /// The root's own root, where popups live, too.
 QQuickItem* Top(QQuickItem* i_pItem)
@@ -39,16 +52,16 @@ VOperator::VOperator(QWidget& i_rWindow, QQuickWidget& i_rPanel) : m_rWindow(i_r
 QQuickItem* VOperator::Item(const QString& i_rName) const
 {
 	QQuickItem* const pTop = Top(m_rPanel.rootObject());
-	QQuickItem* pItem = pTop ? FindItem(pTop, i_rName, true) : nullptr;
+	QQuickItem* pItem = pTop ? Find(pTop, i_rName, true) : nullptr;
 	if (!pItem && pTop)
-		pItem = FindItem(pTop, i_rName, false);
+		pItem = Find(pTop, i_rName, false);
 	EXPECT_TRUE(pItem) << i_rName.toStdString();
 	return pItem;
 }
 
 bool VOperator::Shows(const QString& i_rName, const QString& i_rText) const
 {
-	const QQuickItem* const pItem = FindItem(Top(m_rPanel.rootObject()), i_rName, true);
+	const QQuickItem* const pItem = Find(Top(m_rPanel.rootObject()), i_rName, true);
 	return pItem && pItem->property("text").toString() == i_rText;
 }
 
@@ -157,6 +170,37 @@ void VOperator::Wheel(int i_Notches)
 	QTest::qWait(0);
 }
 
+void VOperator::ChooseInNextDialog(
+    const char* i_pDialog, const char* i_pBox, const QString& i_rEntry, const char* i_pButton)
+{
+	auto* const pTimer = new QTimer(&m_rWindow);
+	QObject::connect(pTimer, &QTimer::timeout, pTimer,
+	    [=]
+	    {
+		    QWidget* const pDialog = QApplication::activeModalWidget();
+		    if (!pDialog || !pDialog->windowHandle() || !pDialog->windowHandle()->isExposed())
+			    return;
+		    pTimer->deleteLater();
+		    pTimer->stop();
+		    ASSERT_EQ(pDialog->objectName(), i_pDialog);
+		    const auto click = [=](const QWidget& i_rWidget, const QPoint& i_rPlace)
+		    { QTest::mouseClick(pDialog->windowHandle(), Qt::LeftButton, {}, i_rWidget.mapTo(pDialog, i_rPlace)); };
+		    auto* const pBox = pDialog->findChild<QComboBox*>(i_pBox);
+		    const auto* const pPages = pDialog->findChild<QTabWidget*>();
+		    for (int page = 0; !pBox->isVisible() && page < pPages->count(); ++page)
+			    click(*pPages->tabBar(), pPages->tabBar()->tabRect(page).center());
+		    click(*pBox, pBox->rect().center());
+		    ASSERT_TRUE(Eventually([] { return QApplication::activePopupWidget() != nullptr; }));
+		    for (const Qt::Key key : {Qt::Key_Home, Qt::Key_Down, Qt::Key_Return})
+			    if (key != Qt::Key_Down || i_rEntry != pBox->itemText(0))
+				    QTest::keyClick(QApplication::activePopupWidget()->windowHandle(), key);
+		    EXPECT_EVENTUALLY(pBox->currentText() == i_rEntry);
+		    const auto* const pButton = pDialog->findChild<QWidget*>(i_pButton);
+		    click(*pButton, pButton->rect().center());
+	    });
+	pTimer->start(10);
+}
+
 QImage VOperator::See(const QPointF& i_rPlace, int i_Reach) const
 {
 	const QPoint corner = InWindow(i_rPlace) - QPoint(i_Reach, i_Reach);
@@ -213,7 +257,7 @@ void VOperator::Choose(const QString& i_rName, const QString& i_rEntry)
 void VOperator::ClickRow(const QString& i_rList, int i_Row, Qt::KeyboardModifiers i_Modifiers)
 {
 	for (const char* const pView : {"View", "Rows"})
-		if (QQuickItem* const pList = FindItem(Top(m_rPanel.rootObject()), i_rList + pView, true))
+		if (QQuickItem* const pList = Find(Top(m_rPanel.rootObject()), i_rList + pView, true))
 			QMetaObject::invokeMethod(pList, "positionViewAtIndex", Q_ARG(int, i_Row), Q_ARG(int, 0 /* beginning */));
 	QTest::qWait(0);
 	Click(i_rList + "Row" + QString::number(i_Row), i_Modifiers);
@@ -240,6 +284,14 @@ void VOperator::AnswerDialog(const QString& i_rPath)
 		QTest::keyClick(pDialog->windowHandle(), letter.toLatin1());
 	QTest::keyClick(pDialog->windowHandle(), Qt::Key_Return);
 	EXPECT_TRUE(ComeBack());
+}
+
+bool VOperator::DismissDialog()
+{
+	if (!Eventually([this] { return Dialog() != nullptr; }))
+		return false;
+	QTest::keyClick(Dialog()->windowHandle(), Qt::Key_Escape);
+	return ComeBack();
 }
 
 bool VOperator::ComeBack()

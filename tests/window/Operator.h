@@ -41,6 +41,9 @@ public:
 	    Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
 	/// Notches of the wheel, away from the user.
 	void Wheel(int i_Notches);
+	/// In a box of a dialog that keeps the keyboard until it is answered, as soon as it opens: picks the entry with
+	/// this text, then the dialog's button.
+	void ChooseInNextDialog(const char* i_pDialog, const char* i_pBox, const QString& i_rEntry, const char* i_pButton);
 	/// What stands on the screen around a place of the preview.
 	QImage See(const QPointF& i_rPlace, int i_Reach) const;
 
@@ -63,6 +66,9 @@ public:
 	/// In the file dialog that is open, or opens soon: types the path and presses Enter. A test failure if there is
 	/// none.
 	void AnswerDialog(const QString& i_rPath);
+	/// Waits for a file dialog and closes it.
+	/// @return false if none comes.
+	bool DismissDialog();
 
 private:
 	QWidget* Dialog() const;

@@ -6,12 +6,8 @@
 
 #include "studio/Services.h"
 
-#include <QAbstractButton>
-#include <QApplication>
-#include <QComboBox>
 #include <QFile>
 #include <QRegularExpression>
-#include <QTimer>
 
 namespace
 {
@@ -303,7 +299,7 @@ TEST_F(Preview, SelectsLikeTheLists)
 	rOperator.Wheel(10);
 	m_Eye.m_Distance *= std::pow(0.9, 10);
 	using VBone = std::pair<const char*, const char*>;
-	const VBone right{"R_Radius", "R_Hand"}, target{"foreArmRight", "palmRight"}, nothing{};
+	const VBone left{"L_Radius", "L_Hand"}, right{"R_Radius", "R_Hand"}, target{"foreArmRight", "palmRight"}, nothing{};
 	struct VRow
 	{
 		const char* m_pName;
@@ -313,9 +309,14 @@ TEST_F(Preview, SelectsLikeTheLists)
 	};
 	const VRow rows[] = {
 	    {"a click selects", right, Qt::NoModifier, {"R_Radius"}},
-	    {"and replaces all kinds", target, Qt::NoModifier, {"foreArmRight"}},
+	    {"and replaces", left, Qt::NoModifier, {"L_Radius"}},
+	    {"all kinds", target, Qt::NoModifier, {"foreArmRight"}},
 	    {"Shift adds", right, Qt::ShiftModifier, {"foreArmRight", "R_Radius"}},
-	    {"Ctrl takes away", right, Qt::ControlModifier, {"foreArmRight"}},
+	    {"once", right, Qt::ShiftModifier, {"foreArmRight", "R_Radius"}},
+	    {"Ctrl adds", left, Qt::ControlModifier, {"foreArmRight", "R_Radius", "L_Radius"}},
+	    {"Ctrl takes away", right, Qt::ControlModifier, {"foreArmRight", "L_Radius"}},
+	    {"both take away", left, Qt::ControlModifier | Qt::ShiftModifier, {"foreArmRight"}},
+	    {"nothing is added", nothing, Qt::ShiftModifier, {"foreArmRight"}},
 	    {"nothing is left", nothing, Qt::NoModifier, {}},
 	    {"Alt selects, too", right, Qt::AltModifier, {"R_Radius"}},
 	};
@@ -347,39 +348,38 @@ TEST_F(Preview, SelectsLikeTheLists)
 	EXPECT_EVENTUALLY(rOperator.Property(row, "color") == marked);
 	EXPECT_EVENTUALLY(Sees(place, IsWhite, 12));
 
-	// Rectangles, with the other preference.
-	QTimer answer;
-	QObject::connect(&answer, &QTimer::timeout,
-	    []
-	    {
-		    const QWidget* const pDialog = QApplication::activeModalWidget();
-		    if (!pDialog)
-			    return;
-		    pDialog->findChild<QComboBox*>("NavigationAlt")->setCurrentText("while Alt is held");
-		    pDialog->findChild<QAbstractButton*>("PreferencesOk")->click();
-	    });
-	answer.start(10);
-	rOperator.Key(Qt::Key_Comma, Qt::ControlModifier);
+	// Rectangles, with the one preference and the other.
 	const QRect shins = QRectF(Middle("R_Tibia", "R_Foot"), Middle("shinRight", "hockRight"))
 	                        .normalized()
 	                        .adjusted(-8, -8, 8, 8)
 	                        .toRect();
-	rOperator.Press(Qt::LeftButton, shins.topLeft());
-	rOperator.Point(shins.center());
-	rOperator.Point(shins.bottomRight());
-	EXPECT_EVENTUALLY(ToolTip() == "Template : R_Tibia<br>Template : shinRight") << ToolTip().toStdString();
-	EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "Template : R_Tibia\nTemplate : shinRight"));
-	EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
-	rOperator.Release(Qt::LeftButton, shins.bottomRight());
-	EXPECT_EVENTUALLY(
-	    Selected() == QStringList({"R_Tibia", "shinRight"}) || Selected() == QStringList({"shinRight", "R_Tibia"}))
-	    << Selected().join(' ').toStdString();
+	for (const Qt::KeyboardModifiers modifiers : {Qt::KeyboardModifiers(Qt::AltModifier), Qt::KeyboardModifiers()})
+	{
+		rOperator.Press(Qt::LeftButton, shins.topLeft(), modifiers);
+		rOperator.Point(shins.center(), modifiers);
+		rOperator.Point(shins.bottomRight(), modifiers);
+		EXPECT_EVENTUALLY(ToolTip() == "Template : R_Tibia<br>Template : shinRight") << ToolTip().toStdString();
+		EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "Template : R_Tibia\nTemplate : shinRight"));
+		EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
+		rOperator.Release(Qt::LeftButton, shins.bottomRight(), modifiers);
+		EXPECT_EVENTUALLY(
+		    Selected() == QStringList({"R_Tibia", "shinRight"}) || Selected() == QStringList({"shinRight", "R_Tibia"}))
+		    << Selected().join(' ').toStdString();
 
-	// A drag that moves the camera selects nothing.
-	rOperator.Drag({Qt::LeftButton}, Nowhere().toPoint(), Nowhere().toPoint() - QPoint(40, -20), Qt::AltModifier);
-	m_Eye.Orbit({-40, 20});
-	PointAtBone(target.first, target.second);
-	EXPECT_EQ(Selected().size(), 2);
+		// A drag that moves the camera selects nothing.
+		rOperator.Drag(
+		    {Qt::LeftButton}, Nowhere().toPoint(), Nowhere().toPoint() - QPoint(40, -20), modifiers ^ Qt::AltModifier);
+		m_Eye.Orbit({-40, 20});
+		PointAtBone(target.first, target.second);
+		rOperator.Drag(
+		    {Qt::LeftButton}, Nowhere().toPoint(), Nowhere().toPoint() - QPoint(-40, 20), modifiers ^ Qt::AltModifier);
+		m_Eye.Orbit({40, -20});
+		EXPECT_EQ(Selected().size(), 2);
+		if (!modifiers)
+			break;
+		rOperator.ChooseInNextDialog("Preferences", "NavigationAlt", "while Alt is held", "PreferencesOk");
+		rOperator.Key(Qt::Key_Comma, Qt::ControlModifier);
+	}
 }
 
 } // namespace
