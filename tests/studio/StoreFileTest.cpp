@@ -76,7 +76,7 @@ TEST_F(Store, ComesBackInTheNextRun)
 	const auto pNext = std::make_shared<VDataStore>();
 	{
 		const StudioHost::VStoreFile file(m_Settings, pNext, m_pDispatcher);
-		EXPECT_EQ(messages.Take(), "Store: The settings' entry 'RetargetSetup/Odd' cannot be read and is left out\n");
+		EXPECT_EQ(messages.Take(), "3 Store: The settings' entry 'RetargetSetup/Odd' cannot be read and is left out");
 		const VDataReader reader(pNext);
 		EXPECT_EQ(
 		    reader.GetKeys({}), (std::vector<std::string>{"RetargetSetup/TargetRoot", "RetargetSetup/TargetScale"}));
@@ -119,8 +119,8 @@ TEST_F(Store, HoldsThePreferences)
 	VDataWriter(m_pStore).SetFloat64("FolderProps", 1.0);
 	EXPECT_TRUE(preferences.Folder("FolderProps").empty());
 	EXPECT_EQ(messages.Take(),
-	    "Store: Failed getting value for store entry 'FolderProps': the requested value type does not match the store "
-	    "value type.\n");
+	    "2 Store: Failed getting value for store entry 'FolderProps': the requested value type does not match the "
+	    "store value type.");
 }
 
 } // namespace

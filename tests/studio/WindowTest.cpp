@@ -109,7 +109,7 @@ TEST_F(Window, TakesDroppedFilesByKind)
 	EXPECT_FALSE(Drop({note}));
 	EXPECT_TRUE(Drop({target, note, c_Fbx, c_Source}));
 	EXPECT_EQ(m_Messages.Take(),
-	    "Import: " + note.toStdString() + " is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx\n");
+	    "2 Import: " + note.toStdString() + " is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx");
 	EXPECT_EQ(Parameter("SourceSkeleton"), c_Source.toStdString());
 	EXPECT_EQ(Parameter("TargetFBX"), c_Fbx.toStdString());
 	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));
@@ -120,7 +120,7 @@ TEST_F(Window, TakesDroppedFilesByKind)
 	EXPECT_NE(m_Messages.Take().find("Command: LoadTargetSubjectURL did nothing: "), std::string::npos);
 	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));
 	EXPECT_TRUE(Drop({Path("gone.fbx")}));
-	EXPECT_EQ(m_Messages.Take(), "Import: " + Path("gone.fbx").toStdString() + " does not exist\n");
+	EXPECT_EQ(m_Messages.Take(), "2 Import: " + Path("gone.fbx").toStdString() + " does not exist");
 	EXPECT_EQ(RecentFiles().size(), 3);
 }
 
@@ -162,7 +162,7 @@ TEST_F(Window, ExplainsSilentCommands)
 	QMetaObject::invokeMethod(pPanel->contextProperty("ContextRetargetSetup").value<QObject*>(), "CreateTargetSubject");
 	RunEvents();
 	const std::string message = m_Messages.Take();
-	EXPECT_EQ(message.find("Command: CreateTargetSubject did nothing: "), 0u) << message;
+	EXPECT_EQ(message.find("3 Command: CreateTargetSubject did nothing: "), 0u) << message;
 	const QAbstractItemModel& rLog = m_pWindow->Log();
 	const int last = rLog.rowCount() - 1;
 	EXPECT_EQ(rLog.index(last, StudioHost::VLogModel::ECategory).data().toString(), "Command");

@@ -266,6 +266,7 @@ TEST(ComboBox, FiltersFiveThousand)
 			const names = []
 			for (let i = 0; i < 5000; ++i)
 				names.push(" ".repeat(i % 4) + (i % 2 ? "Left" : "Right") + "Bone" + i)
+			names[1] = "LeftBone2501Ctrl"
 			return names
 		}
 		OrlexComboBox { objectName: "box"; width: 200; currentIndex: 4321; model: page.names })"));
@@ -298,6 +299,11 @@ TEST(ComboBox, FiltersFiveThousand)
 	EXPECT_GT(page.Property("boxList", "currentIndex").toInt(), 1499 + 5);
 	page.Key(Qt::Key_Escape);
 	EXPECT_EQ(page.Property("box", "displayText"), "LeftBone1499");
+	// What is typed in full is meant, not what begins with it.
+	page.Type("leftbone2501");
+	EXPECT_EQ(rows(), 2);
+	page.Key(Qt::Key_Return);
+	EXPECT_EQ(page.Property("box", "displayText"), "LeftBone2501");
 }
 
 TEST(ComboBox, StaysInItsWindow)

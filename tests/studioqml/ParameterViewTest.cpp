@@ -566,8 +566,10 @@ TEST_F(ParameterView, EveryControlHasAnAccessibleName)
 	EXPECT_EQ(rFlag.GetValueText(), "true");
 	act("Flag", "Toggle");
 	EXPECT_EQ(rFlag.GetValueText(), "false");
+	EXPECT_FALSE(m_Page.Has("WeightReset")) << "no default";
 	act("ScaleReset", "Press");
 	EXPECT_EQ(rScale.GetValueText(), "1");
+	EXPECT_FALSE(m_Page.Has("ScaleReset"));
 	act("viewAdvanced", "Press");
 	EXPECT_TRUE(m_Page.Has("Deep"));
 	act("Root", "Press");

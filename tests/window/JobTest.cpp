@@ -2,8 +2,6 @@
 
 #include "WindowFixture.h"
 
-#include "CoreOrlexQRTIO/Reader.h"
-#include "CoreOrlexTypes/TextForm.h"
 #include "studio/Services.h"
 
 #include <QFile>
@@ -14,22 +12,6 @@ namespace
 class Job : public Window
 {
 protected:
-	/// A subject of one target as programs of old wrote it.
-	QByteArray LegacyFile()
-	{
-		const QByteArray made = CommandLine({"create", "--fbx", File("character.fbx"), "--source",
-		    File("performer.qrs"), "--rotation", "Pelvis:haunch"});
-		CoreOrlexTypes::VSubjectRecord record;
-		CoreOrlexQRTIO::VSubjectQRTExtras extras;
-		std::vector<std::string> errors;
-		std::vector<std::string> warnings;
-		EXPECT_TRUE(CoreOrlexQRTIO::VReader().ReadText(made.toStdString(), "Template", 0x0FFFFFFFu,
-		    record.m_SubjectParametrised, record.m_SubjectApplicationData, extras, errors, warnings));
-		std::string text;
-		EXPECT_TRUE(CoreOrlexTypes::WriteText(record, text));
-		return "[[1,0,1],\"\"]" + QByteArray::fromStdString(text);
-	}
-
 	void SelectPair(const char* i_pSource, const char* i_pTarget)
 	{
 		m_pOperator->ClickRow("sourceSegments", RowOf("sourceSegments", i_pSource));
@@ -171,7 +153,10 @@ TEST_F(Job, SelectsWithMouseAndKeys)
 TEST_F(Job, ALegacyFileIsSavedUnderANewName)
 {
 	VOperator& rOperator = *m_pOperator;
-	const QByteArray legacy = LegacyFile();
+	// A subject of one target as programs of old wrote it.
+	CommandLine(
+	    {"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--rotation", "Pelvis:haunch"});
+	const QByteArray legacy = "[[1,0,1],\"\"]" + Run({"dump", File("expected.qrr")});
 	QFile file(File("old.qrx"));
 	ASSERT_TRUE(file.open(QIODevice::WriteOnly) && file.write(legacy) == legacy.size());
 	file.close();

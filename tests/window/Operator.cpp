@@ -1,5 +1,6 @@
 #include "Operator.h"
 
+#include "../FindItem.h"
 #include "../WaitFor.h"
 
 #include <gtest/gtest.h>
@@ -22,16 +23,6 @@
 namespace
 {
 
-QQuickItem* Find(QQuickItem* i_pItem, const QString& i_rName, bool i_bVisible)
-{
-	if (i_pItem->objectName() == i_rName && (!i_bVisible || i_pItem->isVisible()))
-		return i_pItem;
-	for (QQuickItem* const pChild : i_pItem->childItems())
-		if (QQuickItem* const pFound = Find(pChild, i_rName, i_bVisible))
-			return pFound;
-	return nullptr;
-}
-
 /// The root's own root, where popups live, too.
 QQuickItem* Top(QQuickItem* i_pItem)
 {
@@ -52,16 +43,16 @@ VOperator::VOperator(QWidget& i_rWindow, QQuickWidget& i_rPanel) : m_rWindow(i_r
 QQuickItem* VOperator::Item(const QString& i_rName) const
 {
 	QQuickItem* const pTop = Top(m_rPanel.rootObject());
-	QQuickItem* pItem = pTop ? Find(pTop, i_rName, true) : nullptr;
+	QQuickItem* pItem = pTop ? FindItem(pTop, i_rName, true) : nullptr;
 	if (!pItem && pTop)
-		pItem = Find(pTop, i_rName, false);
+		pItem = FindItem(pTop, i_rName, false);
 	EXPECT_TRUE(pItem) << i_rName.toStdString();
 	return pItem;
 }
 
 bool VOperator::Shows(const QString& i_rName, const QString& i_rText) const
 {
-	const QQuickItem* const pItem = Find(Top(m_rPanel.rootObject()), i_rName, true);
+	const QQuickItem* const pItem = FindItem(Top(m_rPanel.rootObject()), i_rName, true);
 	return pItem && pItem->property("text").toString() == i_rText;
 }
 
@@ -257,7 +248,7 @@ void VOperator::Choose(const QString& i_rName, const QString& i_rEntry)
 void VOperator::ClickRow(const QString& i_rList, int i_Row, Qt::KeyboardModifiers i_Modifiers)
 {
 	for (const char* const pView : {"View", "Rows"})
-		if (QQuickItem* const pList = Find(Top(m_rPanel.rootObject()), i_rList + pView, true))
+		if (QQuickItem* const pList = FindItem(Top(m_rPanel.rootObject()), i_rList + pView, true))
 			QMetaObject::invokeMethod(pList, "positionViewAtIndex", Q_ARG(int, i_Row), Q_ARG(int, 0 /* beginning */));
 	QTest::qWait(0);
 	Click(i_rList + "Row" + QString::number(i_Row), i_Modifiers);
@@ -284,14 +275,6 @@ void VOperator::AnswerDialog(const QString& i_rPath)
 		QTest::keyClick(pDialog->windowHandle(), letter.toLatin1());
 	QTest::keyClick(pDialog->windowHandle(), Qt::Key_Return);
 	EXPECT_TRUE(ComeBack());
-}
-
-bool VOperator::DismissDialog()
-{
-	if (!Eventually([this] { return Dialog() != nullptr; }))
-		return false;
-	QTest::keyClick(Dialog()->windowHandle(), Qt::Key_Escape);
-	return ComeBack();
 }
 
 bool VOperator::ComeBack()

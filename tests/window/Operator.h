@@ -66,9 +66,6 @@ public:
 	/// In the file dialog that is open, or opens soon: types the path and presses Enter. A test failure if there is
 	/// none.
 	void AnswerDialog(const QString& i_rPath);
-	/// Waits for a file dialog and closes it.
-	/// @return false if none comes.
-	bool DismissDialog();
 
 private:
 	QWidget* Dialog() const;
