@@ -1,4 +1,3 @@
-#include "Damage.h"
 #include "RandomValue.h"
 
 #include "CoreOrlexTypes/Difference.h"
@@ -37,6 +36,23 @@ static_assert(c_bWhole<VSubject, VSubject::VSegment, VSubject::VJoint, VSubject:
 static_assert(c_bWhole<VSubjectApplicationData, VSubjectApplicationData::VMarker, VSubjectApplicationData::VJoint,
     VSubjectApplicationData::VSegment, VSubjectApplicationData::VStick, VSubjectApplicationData::VTarget, VColour,
     VSubjectRecord, VTextHeader>);
+
+/// Calls the visitor once for each number, text or enumeration inside a value, and for each list.
+template <typename T, typename TVisitor>
+void ForEachLeaf(T& io_rValue, TVisitor&& i_rVisitor)
+{
+	if constexpr (CRecord<T>)
+		ForEachField<T>([&](const auto& i_rField) { ForEachLeaf(io_rValue.*i_rField.pMember, i_rVisitor); });
+	else if constexpr (requires { io_rValue.begin(); } && !std::is_same_v<T, std::string>)
+	{
+		for (auto& rElement : io_rValue)
+			ForEachLeaf(rElement, i_rVisitor);
+		if constexpr (requires { io_rValue.pop_back(); })
+			i_rVisitor(io_rValue);
+	}
+	else
+		i_rVisitor(io_rValue);
+}
 
 template <typename T>
 class Equality : public testing::Test
