@@ -37,60 +37,6 @@ inline VNumbers RigidBodyCovariance(std::size_t i_MarkerCount)
 	return values;
 }
 
-inline VSubject::VTarget GoodTarget(VSubject::VTarget::ETargetType i_Type)
-{
-	using VTarget = VSubject::VTarget;
-	VTarget target;
-	target.m_Type = i_Type;
-	const bool bRotation =
-	    i_Type == VTarget::ELocalRotationToWorldRotation || i_Type == VTarget::ELocalDirectionToWorldDirection;
-	if (i_Type == VTarget::ERigidBody)
-		target.m_MarkerIndices = {0, 1, 3};
-	else if (!bRotation)
-		target.m_MarkerIndices = {1};
-	if (bRotation)
-		target.m_RotationObservationIndices = {1};
-	target.m_SegmentIndices = {1};
-	target.m_ViewNormals.resize(target.m_MarkerIndices.size());
-	switch (i_Type)
-	{
-	case VTarget::ELocalPointToWorldPointGaussian: target.m_Covariance = Diagonal(3, 4.0); [[fallthrough]];
-	case VTarget::ELocalPointToWorldPoint: target.m_State = {1, 2, 3}; break;
-	case VTarget::ELocalRotationToWorldRotation:
-	case VTarget::ELocalDirectionToWorldDirection: target.m_State = {0, 0, 1}; break;
-	case VTarget::ELocalPlaneToWorldPointGaussian: target.m_Covariance = {-7}; [[fallthrough]];
-	case VTarget::ELocalPlaneToWorldPoint: target.m_State = VNumbers(6, 1.0); break;
-	case VTarget::ELocalLineToWorldPointGaussian: target.m_Covariance = {-7, 1, 2, 3}; [[fallthrough]];
-	case VTarget::ELocalLineToWorldPoint: target.m_State = VNumbers(6, 1.0); break;
-	case VTarget::ERigidBody:
-		target.m_State = VNumbers(15, 1.0);
-		target.m_Covariance = RigidBodyCovariance(3);
-		break;
-	default: break;
-	}
-	return target;
-}
-
-/// Two segments, four markers, two rotations, one good target of each type.
-inline VSubject GoodSubject()
-{
-	VSubject subject;
-	subject.m_Segments.resize(2);
-	subject.m_Segments[1].m_SegmentIndex = 1;
-	subject.m_Segments[1].m_ParentSegmentIndex = 0;
-	subject.m_Segments[1].m_TreeDepth = 1;
-	subject.m_Markers.resize(4);
-	for (std::uint32_t i = 0; i < 4; ++i)
-	{
-		subject.m_Markers[i].m_MarkerId = 100 + i;
-		subject.m_Markers[i].m_Name = std::string(1, char('A' + i));
-	}
-	subject.m_Rotations.resize(2);
-	for (int type = 0; type < 10; ++type)
-		subject.m_Targets.push_back(GoodTarget(VSubject::VTarget::ETargetType(type)));
-	return subject;
-}
-
 /// Messages as "category: text" in their order; all are errors.
 class CheckedSubject : public testing::Test
 {

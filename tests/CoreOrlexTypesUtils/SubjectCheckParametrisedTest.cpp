@@ -1,9 +1,6 @@
 #include "CheckedSubject.h"
 
 #include "CoreOrlexTypesUtils/SubjectCheck.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
-
-#include <algorithm>
 
 namespace Parametrised
 {
@@ -12,23 +9,65 @@ using namespace CoreOrlexTypesUtils;
 using VTarget = VSubjectParametrised::VTarget;
 using VJoint = VSubjectParametrised::VJoint;
 
-/// The good subject of numbers with a ball joint, and with expressions over one parameter of each kind.
-VSubjectParametrised GoodParametrised()
+VTarget GoodTarget(VTarget::ETargetType i_Type)
+{
+	VTarget target;
+	target.m_Type = i_Type;
+	const bool bRotation =
+	    i_Type == VTarget::ELocalRotationToWorldRotation || i_Type == VTarget::ELocalDirectionToWorldDirection;
+	target.m_StateExpressions = {"0", "Arm/Arm", ""};
+	target.m_SegmentIndices = {1};
+	if (bRotation)
+		target.m_RotationObservationIndices = {0};
+	else if (i_Type == VTarget::ERigidBody)
+		target.m_MarkerIndices = {0, 1, 2};
+	else
+		target.m_MarkerIndices = {0};
+	target.m_ViewNormals.resize(target.m_MarkerIndices.size());
+	if (i_Type >= VTarget::ELocalPlaneToWorldPoint && i_Type <= VTarget::ERigidBody)
+		target.m_StateExpressions.resize(i_Type == VTarget::ERigidBody ? 15 : 6);
+	switch (i_Type)
+	{
+	case VTarget::ELocalPointToWorldPointGaussian: target.m_Covariance = Diagonal(3, 1.0); break;
+	case VTarget::ELocalPlaneToWorldPointGaussian: target.m_Covariance = target.m_TemplateCovariance = {1}; break;
+	case VTarget::ELocalLineToWorldPointGaussian:
+		target.m_Covariance = target.m_TemplateCovariance = Diagonal(2, 1.0);
+		break;
+	case VTarget::ERigidBody: target.m_Covariance = RigidBodyCovariance(3); break;
+	default: break;
+	}
+	return target;
+}
+
+/// A root and a ball joint, three markers, a rotation, one good target of each type, one parameter of each kind.
+VSubjectParametrised GoodSubject()
 {
 	VSubjectParametrised subject;
-	SubjectParametrisedConverter::ConvertSubject(GoodSubject(), subject);
 	subject.m_StaticParameters.resize(1);
 	subject.m_StaticParameters[0].m_Name = "Arm";
 	subject.m_StaticParameters[0].m_DefaultExpression = "300*cos(0)";
 	subject.m_DynamicParameters.push_back({"GlobalScale", 1, 0, 1, false});
+	subject.m_Segments.resize(2);
+	subject.m_Segments[0].m_Name = "Hips";
 	auto& rSegment = subject.m_Segments[1];
 	rSegment.m_Name = "Spine";
+	rSegment.m_SegmentIndex = 1;
+	rSegment.m_ParentSegmentIndex = 0;
+	rSegment.m_TreeDepth = 1;
 	rSegment.m_PreTranslation = {"2*Arm*GlobalScale", "", "-1"};
 	rSegment.m_Joint.m_JointType = VJoint::EBall;
 	rSegment.m_Joint.m_Mean.resize(3);
 	rSegment.m_Joint.m_Covariance = Diagonal(3, 10.0);
+	subject.m_Markers.resize(3);
+	for (std::uint32_t i = 0; i < 3; ++i)
+	{
+		subject.m_Markers[i].m_MarkerId = i;
+		subject.m_Markers[i].m_Name = "M" + std::to_string(i);
+	}
+	subject.m_Rotations.resize(1);
+	subject.m_Targets.push_back(VTarget());
 	for (int type = 1; type < 10; ++type)
-		std::ranges::copy(VTexts{"0", "Arm/Arm", ""}, subject.m_Targets[type].m_StateExpressions.begin());
+		subject.m_Targets.push_back(GoodTarget(VTarget::ETargetType(type)));
 	return subject;
 }
 
@@ -50,7 +89,7 @@ VTexts Listed(const VSubjectParametrised& i_rSubject)
 class SubjectCheckParametrised : public CheckedSubject
 {
 protected:
-	VSubjectParametrised m_Subject = GoodParametrised();
+	VSubjectParametrised m_Subject = GoodSubject();
 
 	VTexts Messages()
 	{
@@ -67,8 +106,7 @@ TEST_F(SubjectCheckParametrised, GoodSubjectsPassInSilence)
 	rJoint.m_TemplateCovariance = VNumbers(9, 0.0);
 	rJoint.m_TemplateRangeMatrix = Diagonal(3, 4.0);
 	m_Subject.m_Targets[VTarget::ELocalPointToWorldPoint].m_TemplateCovariance = Diagonal(3, 1.0);
-	m_Subject.m_Targets[VTarget::ELocalPointToWorldPointGaussian].m_TemplateCovariance.clear();
-	m_Subject.m_Targets[VTarget::ERigidBody].m_TemplateCovariance.clear();
+	m_Subject.m_Targets[VTarget::ERigidBody].m_TemplateCovariance = RigidBodyCovariance(3);
 	m_Subject.m_Targets[VTarget::ERigidBody].m_Weight = m_Subject.m_Targets[1].m_CalibrationWeight = 0.0;
 	ExpectPasses([&] { return CheckSubjectParametrised(m_Subject); });
 	EXPECT_EQ(Listed(m_Subject), VTexts{});
@@ -102,34 +140,10 @@ TEST_F(SubjectCheckParametrised, TemplatesOfJointsTellEverything)
 
 TEST_F(SubjectCheckParametrised, TemplatesOfTargets)
 {
-	const struct
-	{
-		int m_Type;
-		std::size_t m_Size;
-		const char* m_pExpected;
-	} sizes[] = {{1, 8, "ELocalPointToWorldPoint type expects size 9"},
-	    {2, 10, "ELocalPointToWorldPointGaussian type expects size 9"},
-	    {3, 1, "ELocalPlaneToWorldPoint type expects size 0"},
-	    {4, 0, "ELocalPlaneToWorldPointGaussian type expects size 1"},
-	    {5, 1, "ELocalLineToWorldPoint type expects size 0"},
-	    {6, 0, "ELocalLineToWorldPointGaussian type expects size 4"},
-	    {7, 62, "ERigidBody type expects size 36 + 9*MarkerCount"},
-	    {8, 1, "ELocalRotationToWorldRotation type expects size 0"},
-	    {9, 1, "ELocalDirectionToWorldDirection type expects size 0"}};
-	for (const auto& rRow : sizes)
-	{
-		VTarget target = m_Subject.m_Targets[rRow.m_Type];
-		ExpectPasses([&] { return CheckTargetTemplate(target); });
-		target.m_TemplateCovariance.resize(rRow.m_Size);
-		// The first finding ends it.
-		target.m_CalibrationWeight = -1;
-		target.m_ViewNormals.resize(7);
-		EXPECT_EQ(Failing([&] { return CheckTargetTemplate(target); }),
-		    VTexts{std::string("Incorrect template covariance size, ") + rRow.m_pExpected});
-	}
-
+	const std::string size = "Incorrect template covariance size, ";
 	const std::string invalid = "Invalid target template covariance matrix";
 	const std::string weight = "Invalid target calibration weight";
+	const std::string normals = "Invalid target view normals";
 	const struct
 	{
 		int m_Type;
@@ -139,10 +153,28 @@ TEST_F(SubjectCheckParametrised, TemplatesOfTargets)
 	    {1, [](VTarget& io_r) { io_r.m_Weight = -1e-9; }, {}},
 	    {1, [](VTarget& io_r) { io_r.m_Weight = c_NaN; }, {}},
 	    {1, [](VTarget& io_r) { io_r.m_Type = VTarget::ETargetType(10); }, {"Unknown target type"}},
+	    {1, [](VTarget& io_r) { io_r.m_TemplateCovariance.resize(8); },
+	        {size + "ELocalPointToWorldPoint type expects size 9"}},
+	    {2, [](VTarget& io_r) { io_r.m_TemplateCovariance.resize(10); },
+	        {size + "ELocalPointToWorldPointGaussian type expects size 9"}},
+	    {3, [](VTarget& io_r) { io_r.m_TemplateCovariance.resize(1); },
+	        {size + "ELocalPlaneToWorldPoint type expects size 0"}},
+	    {4, [](VTarget& io_r) { io_r.m_TemplateCovariance.clear(); },
+	        {size + "ELocalPlaneToWorldPointGaussian type expects size 1"}},
+	    {5, [](VTarget& io_r) { io_r.m_TemplateCovariance.resize(1); },
+	        {size + "ELocalLineToWorldPoint type expects size 0"}},
+	    {6, [](VTarget& io_r) { io_r.m_TemplateCovariance.clear(); },
+	        {size + "ELocalLineToWorldPointGaussian type expects size 4"}},
+	    {7, [](VTarget& io_r) { io_r.m_TemplateCovariance.resize(62); },
+	        {size + "ERigidBody type expects size 36 + 9*MarkerCount"}},
+	    {8, [](VTarget& io_r) { io_r.m_TemplateCovariance.resize(1); },
+	        {size + "ELocalRotationToWorldRotation type expects size 0"}},
+	    {9, [](VTarget& io_r) { io_r.m_TemplateCovariance.resize(1); },
+	        {size + "ELocalDirectionToWorldDirection type expects size 0"}},
 	    {1, [](VTarget& io_r) { io_r.m_TemplateCovariance = Diagonal(3, -1.0); }, {invalid}},
-	    {2, [](VTarget& io_r) { io_r.m_TemplateCovariance[8] = c_NaN; }, {invalid}},
-	    {7, [](VTarget& io_r) { io_r.m_TemplateCovariance[35] = -1; }, {invalid}},
-	    {7, [](VTarget& io_r) { io_r.m_TemplateCovariance[62] = c_Infinity; }, {invalid}},
+	    {2, [](VTarget& io_r) { io_r.m_TemplateCovariance = Diagonal(3, c_NaN); }, {invalid}},
+	    {7, [](VTarget& io_r) { (io_r.m_TemplateCovariance = RigidBodyCovariance(3))[35] = -1; }, {invalid}},
+	    {7, [](VTarget& io_r) { (io_r.m_TemplateCovariance = RigidBodyCovariance(3))[62] = c_Infinity; }, {invalid}},
 	    {1, [](VTarget& io_r) { io_r.m_CalibrationWeight = -1; }, {weight}},
 	    {2, [](VTarget& io_r) { io_r.m_CalibrationWeight = c_NaN; }, {weight}},
 	    {8, [](VTarget& io_r) { io_r.m_CalibrationWeight = -1; }, {weight}},
@@ -152,7 +184,7 @@ TEST_F(SubjectCheckParametrised, TemplatesOfTargets)
 		        io_r.m_CalibrationWeight = -1;
 		        io_r.m_ViewNormals.clear();
 	        },
-	        {"Invalid target view normals"}},
+	        {normals}},
 	    {8,
 	        [](VTarget& io_r)
 	        {
@@ -160,10 +192,31 @@ TEST_F(SubjectCheckParametrised, TemplatesOfTargets)
 		        io_r.m_CalibrationWeight = -1;
 	        },
 	        {"Invalid rotation calibration behaviour"}},
+	    {8, [](VTarget& io_r) { io_r.m_RotationTargetOrientation.resize(1); },
+	        {"Incorrect rotation target orientation size. Expected 0. Actual 1"}},
+	    {8, [](VTarget& io_r) { io_r.m_RotationCalibrationBehaviour = VTarget::EHardySpicerLike; },
+	        {"Incorrect rotation target orientation size. Expected 3. Actual 0 "}},
+	    {0, [](VTarget& io_r) { io_r.m_ViewNormals.resize(1); }, {normals}},
+	    {9, [](VTarget& io_r) { io_r.m_ViewNormals.resize(1); }, {normals}},
+	    {1,
+	        [](VTarget& io_r) {
+		        io_r.m_ViewNormals[0] = {0, 0, 0.5};
+	        },
+	        {normals}},
+	    // The first finding ends it.
+	    {1,
+	        [](VTarget& io_r)
+	        {
+		        io_r.m_TemplateCovariance.resize(1);
+		        io_r.m_CalibrationWeight = -1;
+		        io_r.m_ViewNormals.clear();
+	        },
+	        {size + "ELocalPointToWorldPoint type expects size 9"}},
 	};
 	for (const auto& rRow : rows)
 	{
 		VTarget target = m_Subject.m_Targets[rRow.m_Type];
+		ExpectPasses([&] { return CheckTargetTemplate(target); });
 		rRow.m_pChange(target);
 		EXPECT_EQ(Failing([&] { return CheckTargetTemplate(target); }), rRow.m_Messages) << "row " << &rRow - rows;
 	}
@@ -233,7 +286,7 @@ TEST_F(SubjectCheckParametrised, StaticParameters)
 
 TEST_F(SubjectCheckParametrised, StepsFollowWhateverWasFound)
 {
-	m_Subject.m_Markers[2].m_Name = "A";
+	m_Subject.m_Markers[2].m_Name = "M0";
 	m_Subject.m_Targets[1].m_SegmentIndices = {2};
 	m_Subject.m_Targets[1].m_Weight = -1;
 	m_Subject.m_Targets[1].m_ViewNormals.clear();
@@ -247,11 +300,11 @@ TEST_F(SubjectCheckParametrised, StepsFollowWhateverWasFound)
 	                               "\"x\" was referenced but never declared";
 	EXPECT_EQ(Messages(),
 	    (VTexts{"SubjectUtils: Could not evaluate m_PreRotation expressions in segment 'Spine'",
-	        "Marker duplicate name: A", "Invalid joint range matrix", "Inconsistent template range information.",
+	        "Marker duplicate name: M0", "Invalid joint range matrix", "Inconsistent template range information.",
 	        "Segment Spine, invalid template values", "Target 1, invalid weights or template values", expression}));
 	// The list goes on after each element, and after each step of an element.
 	EXPECT_EQ(Listed(m_Subject),
-	    (VTexts{"marker 2 A: Marker duplicate name: A", "target 1 : Out of range segment index 2",
+	    (VTexts{"marker 2 M0: Marker duplicate name: M0", "target 1 : Out of range segment index 2",
 	        "target 1 : Invalid target view normals",
 	        "target 8 ~ Incorrect number of rotation observations, ElocalRotationToWorldRotation type expects 1 "
 	        "rotation "

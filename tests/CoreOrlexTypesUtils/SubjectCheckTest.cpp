@@ -10,33 +10,119 @@ using VTarget = VSubject::VTarget;
 using VJoint = VSubject::VJoint;
 using EJointType = VSubjectParametrised::VJoint::EJointType;
 
-/// What the messages about the sizes of a type of target ask for; the covariance's is null where any size is right.
-struct VAsked
+/// Messages of a type whose number of markers, rotation observations, segments, state or covariance values is wrong;
+/// empty where any number is right.
+struct VSizeMessages
 {
-	const char* m_pName;
 	const char* m_pMarkers;
 	const char* m_pRotations;
+	const char* m_pSegments;
 	const char* m_pState;
 	const char* m_pCovariance;
-
-	std::string Message(const std::string& i_rWhat, const std::string& i_rExpected) const
-	{
-		return "Incorrect " + i_rWhat + ", " + m_pName + " type expects " + i_rExpected;
-	}
 };
 
 /// From ELocalPointToWorldPoint on.
-const VAsked c_Asked[] = {
-    {"ELocalPointToWorldPoint", "1 marker", "no rotation observations", "3", nullptr},
-    {"ELocalPointToWorldPointGaussian", "1 marker", "no rotation observations", "3", "9"},
-    {"ELocalPlaneToWorldPoint", "1 marker", "no rotation observations", "6", nullptr},
-    {"ELocalPlaneToWorldPointGaussian", "1 marker", "no rotation observations", "6", "1"},
-    {"ELocalLineToWorldPoint", "1 marker", "no rotation observations", "6", nullptr},
-    {"ELocalLineToWorldPointGaussian", "1 marker", "no rotation observations", "6", "4"},
-    {"ERigidBody", "at least 3 markers", "no rotation observations", "3*(MarkerCount+2)", "36 + 9*MarkerCount"},
-    {"ElocalRotationToWorldRotation", "no markers", "1 rotation observation", "3", "0"},
-    {"ELocalDirectionToWorldDirection", "no markers", "1 rotation observation", "3", "0"},
+const VSizeMessages c_SizeMessages[] = {
+    {"Incorrect number of markers, ELocalPointToWorldPoint type expects 1 marker",
+        "Incorrect number of rotation observations, ELocalPointToWorldPoint type expects no rotation observations",
+        "Incorrect number of parent segments, ELocalPointToWorldPoint type expects 1 segment",
+        "Incorrect state size, ELocalPointToWorldPoint type expects size 3", ""},
+    {"Incorrect number of markers, ELocalPointToWorldPointGaussian type expects 1 marker",
+        "Incorrect number of rotation observations, ELocalPointToWorldPointGaussian type expects no rotation "
+        "observations",
+        "Incorrect number of parent segments, ELocalPointToWorldPointGaussian type expects 1 segment",
+        "Incorrect state size, ELocalPointToWorldPointGaussian type expects size 3",
+        "Incorrect covariance size, ELocalPointToWorldPointGaussian type expects size 9"},
+    {"Incorrect number of markers, ELocalPlaneToWorldPoint type expects 1 marker",
+        "Incorrect number of rotation observations, ELocalPlaneToWorldPoint type expects no rotation observations",
+        "Incorrect number of parent segments, ELocalPlaneToWorldPoint type expects 1 segment",
+        "Incorrect state size, ELocalPlaneToWorldPoint type expects size 6", ""},
+    {"Incorrect number of markers, ELocalPlaneToWorldPointGaussian type expects 1 marker",
+        "Incorrect number of rotation observations, ELocalPlaneToWorldPointGaussian type expects no rotation "
+        "observations",
+        "Incorrect number of parent segments, ELocalPlaneToWorldPointGaussian type expects 1 segment",
+        "Incorrect state size, ELocalPlaneToWorldPointGaussian type expects size 6",
+        "Incorrect covariance size, ELocalPlaneToWorldPointGaussian type expects size 1"},
+    {"Incorrect number of markers, ELocalLineToWorldPoint type expects 1 marker",
+        "Incorrect number of rotation observations, ELocalLineToWorldPoint type expects no rotation observations",
+        "Incorrect number of parent segments, ELocalLineToWorldPoint type expects 1 segment",
+        "Incorrect state size, ELocalLineToWorldPoint type expects size 6", ""},
+    {"Incorrect number of markers, ELocalLineToWorldPointGaussian type expects 1 marker",
+        "Incorrect number of rotation observations, ELocalLineToWorldPointGaussian type expects no rotation "
+        "observations",
+        "Incorrect number of parent segments, ELocalLineToWorldPointGaussian type expects 1 segment",
+        "Incorrect state size, ELocalLineToWorldPointGaussian type expects size 6",
+        "Incorrect covariance size, ELocalLineToWorldPointGaussian type expects size 4"},
+    {"Incorrect number of markers, ERigidBody type expects at least 3 markers",
+        "Incorrect number of rotation observations, ERigidBody type expects no rotation observations",
+        "Incorrect number of parent segments, ERigidBody type expects 1 segment",
+        "Incorrect state size, ERigidBody type expects size 3*(MarkerCount+2)",
+        "Incorrect covariance size, ERigidBody type expects size 36 + 9*MarkerCount"},
+    {"Incorrect number of markers, ElocalRotationToWorldRotation type expects no markers",
+        "Incorrect number of rotation observations, ElocalRotationToWorldRotation type expects 1 rotation observation",
+        "Incorrect number of parent segments, ElocalRotationToWorldRotation type expects 1 segment",
+        "Incorrect state size, ElocalRotationToWorldRotation type expects size 3",
+        "Incorrect covariance size, ElocalRotationToWorldRotation type expects size 0"},
+    {"Incorrect number of markers, ELocalDirectionToWorldDirection type expects no markers",
+        "Incorrect number of rotation observations, ELocalDirectionToWorldDirection type expects 1 rotation "
+        "observation",
+        "Incorrect number of parent segments, ELocalDirectionToWorldDirection type expects 1 segment",
+        "Incorrect state size, ELocalDirectionToWorldDirection type expects size 3",
+        "Incorrect covariance size, ELocalDirectionToWorldDirection type expects size 0"},
 };
+
+VTarget GoodTarget(VTarget::ETargetType i_Type)
+{
+	VTarget target;
+	target.m_Type = i_Type;
+	const bool bRotation =
+	    i_Type == VTarget::ELocalRotationToWorldRotation || i_Type == VTarget::ELocalDirectionToWorldDirection;
+	if (i_Type == VTarget::ERigidBody)
+		target.m_MarkerIndices = {0, 1, 3};
+	else if (!bRotation)
+		target.m_MarkerIndices = {1};
+	if (bRotation)
+		target.m_RotationObservationIndices = {1};
+	target.m_SegmentIndices = {1};
+	target.m_ViewNormals.resize(target.m_MarkerIndices.size());
+	switch (i_Type)
+	{
+	case VTarget::ELocalPointToWorldPointGaussian: target.m_Covariance = Diagonal(3, 4.0); [[fallthrough]];
+	case VTarget::ELocalPointToWorldPoint: target.m_State = {1, 2, 3}; break;
+	case VTarget::ELocalRotationToWorldRotation:
+	case VTarget::ELocalDirectionToWorldDirection: target.m_State = {0, 0, 1}; break;
+	case VTarget::ELocalPlaneToWorldPointGaussian: target.m_Covariance = {-7}; [[fallthrough]];
+	case VTarget::ELocalPlaneToWorldPoint: target.m_State = VNumbers(6, 1.0); break;
+	case VTarget::ELocalLineToWorldPointGaussian: target.m_Covariance = {-7, 1, 2, 3}; [[fallthrough]];
+	case VTarget::ELocalLineToWorldPoint: target.m_State = VNumbers(6, 1.0); break;
+	case VTarget::ERigidBody:
+		target.m_State = VNumbers(15, 1.0);
+		target.m_Covariance = RigidBodyCovariance(3);
+		break;
+	default: break;
+	}
+	return target;
+}
+
+/// Two segments, four markers, two rotations, one good target of each type.
+VSubject GoodSubject()
+{
+	VSubject subject;
+	subject.m_Segments.resize(2);
+	subject.m_Segments[1].m_SegmentIndex = 1;
+	subject.m_Segments[1].m_ParentSegmentIndex = 0;
+	subject.m_Segments[1].m_TreeDepth = 1;
+	subject.m_Markers.resize(4);
+	for (std::uint32_t i = 0; i < 4; ++i)
+	{
+		subject.m_Markers[i].m_MarkerId = 100 + i;
+		subject.m_Markers[i].m_Name = std::string(1, char('A' + i));
+	}
+	subject.m_Rotations.resize(2);
+	for (int type = 0; type < 10; ++type)
+		subject.m_Targets.push_back(GoodTarget(VTarget::ETargetType(type)));
+	return subject;
+}
 
 class SubjectCheck : public CheckedSubject
 {
@@ -67,51 +153,43 @@ TEST_F(SubjectCheck, GoodSubjectsPassInSilence)
 	ExpectPasses([&] { return CheckSubject(subject); });
 }
 
-/// The first wrong size is told; once it is mended, the next.
-TEST_F(SubjectCheck, SizesOfTargetsInTheirOrder)
+TEST_F(SubjectCheck, SizesOfTargetsByType)
 {
+	const auto resize = [](auto& io_rList, int i_Step) { io_rList.resize(io_rList.size() + i_Step); };
 	for (int type = 1; type < 10; ++type)
-		for (const int change : {-1, 1})
+	{
+		SCOPED_TRACE(type);
+		const VSizeMessages& rMessages = c_SizeMessages[type - 1];
+		const VTarget good = GoodTarget(VTarget::ETargetType(type));
+		const auto expect = [&](auto VTarget::*i_pList, const char* i_pMessage)
 		{
-			SCOPED_TRACE(testing::Message() << type << ", " << change);
-			const VAsked& rAsked = c_Asked[type - 1];
-			const VTarget good = GoodTarget(VTarget::ETargetType(type));
-			VTarget bad = good;
-			const auto damage = [&](auto&... io_rList)
-			{ (io_rList.resize(io_rList.empty() ? 2 : io_rList.size() + change), ...); };
-			damage(bad.m_SegmentIndices, bad.m_State, bad.m_Covariance, bad.m_ViewNormals);
-			// A body may have more.
-			if (type != VTarget::ERigidBody || change < 0)
-				damage(bad.m_MarkerIndices);
-			if (type < VTarget::ELocalRotationToWorldRotation)
-				damage(bad.m_RotationObservationIndices);
-			const auto expect = [&](auto VTarget::*i_pList, const std::string& i_rMessage)
-			{
-				if (bad.*i_pList == good.*i_pList)
-					return;
-				EXPECT_EQ(TargetMessages(type, [&](VTarget& io_rTarget) { io_rTarget = bad; }), VTexts{i_rMessage});
-				bad.*i_pList = good.*i_pList;
-			};
-			const auto expectSegmentsAndState = [&]
-			{
-				expect(&VTarget::m_SegmentIndices, rAsked.Message("number of parent segments", "1 segment"));
-				expect(&VTarget::m_State, rAsked.Message("state size", std::string("size ") + rAsked.m_pState));
-			};
-			if (type == VTarget::ELocalDirectionToWorldDirection)
-				expectSegmentsAndState();
-			expect(&VTarget::m_MarkerIndices, rAsked.Message("number of markers", rAsked.m_pMarkers));
-			expect(&VTarget::m_RotationObservationIndices,
-			    rAsked.Message("number of rotation observations", rAsked.m_pRotations));
-			expectSegmentsAndState();
-			if (rAsked.m_pCovariance)
-				expect(&VTarget::m_Covariance,
-				    rAsked.Message("covariance size", std::string("size ") + rAsked.m_pCovariance));
-			expect(&VTarget::m_ViewNormals, "Invalid target view normals");
-		}
+			for (const int step : {(good.*i_pList).empty() ? 2 : -1, 1})
+				EXPECT_EQ(TargetMessages(type, [&](VTarget& io_rTarget) { resize(io_rTarget.*i_pList, step); }),
+				    VTexts{i_pMessage});
+		};
+		if (type != VTarget::ERigidBody)
+			expect(&VTarget::m_MarkerIndices, rMessages.m_pMarkers);
+		if (type < VTarget::ELocalRotationToWorldRotation)
+			expect(&VTarget::m_RotationObservationIndices, rMessages.m_pRotations);
+		expect(&VTarget::m_SegmentIndices, rMessages.m_pSegments);
+		expect(&VTarget::m_State, rMessages.m_pState);
+		if (*rMessages.m_pCovariance)
+			expect(&VTarget::m_Covariance, rMessages.m_pCovariance);
+		else
+			EXPECT_EQ(TargetMessages(type,
+			              [](VTarget& io_rTarget)
+			              {
+				              io_rTarget.m_Covariance.resize(5);
+				              io_rTarget.m_ViewNormals.clear();
+			              }),
+			    VTexts{"Invalid target view normals"});
+	}
+	const VSizeMessages& rRigidBody = c_SizeMessages[VTarget::ERigidBody - 1];
+	EXPECT_EQ(TargetMessages(VTarget::ERigidBody, [](VTarget& io_rTarget) { io_rTarget.m_MarkerIndices.pop_back(); }),
+	    VTexts{rRigidBody.m_pMarkers});
 	// A fourth marker asks for more values.
-	const VAsked& rBody = c_Asked[VTarget::ERigidBody - 1];
 	EXPECT_EQ(TargetMessages(VTarget::ERigidBody, [](VTarget& io_rTarget) { io_rTarget.m_MarkerIndices.push_back(2); }),
-	    VTexts{rBody.Message("state size", std::string("size ") + rBody.m_pState)});
+	    VTexts{rRigidBody.m_pState});
 }
 
 TEST_F(SubjectCheck, TypesThatAskForARotationOnlyComplainOfAnotherNumber)
@@ -123,9 +201,59 @@ TEST_F(SubjectCheck, TypesThatAskForARotationOnlyComplainOfAnotherNumber)
 			subject.m_Targets[type].m_RotationObservationIndices.resize(count);
 			TakeLog();
 			EXPECT_TRUE(CheckTarget(subject, type));
-			const VAsked& rAsked = c_Asked[type - 1];
-			EXPECT_EQ(TakeLog(), VTexts{rAsked.Message("number of rotation observations", rAsked.m_pRotations)});
+			EXPECT_EQ(TakeLog(), VTexts{c_SizeMessages[type - 1].m_pRotations});
 		}
+}
+
+TEST_F(SubjectCheck, TheFirstWrongSizeOfATargetIsTold)
+{
+	for (int type = 1; type < 10; ++type)
+	{
+		SCOPED_TRACE(type);
+		const VSizeMessages& rMessages = c_SizeMessages[type - 1];
+		VTarget bad = GoodTarget(VTarget::ETargetType(type));
+		bad.m_MarkerIndices.resize(2);
+		bad.m_RotationObservationIndices.resize(2);
+		bad.m_SegmentIndices.resize(2);
+		bad.m_State.resize(1);
+		bad.m_Covariance.resize(2);
+		bad.m_ViewNormals.resize(7);
+		// What stands in the way is mended one after the other.
+		VTexts order;
+		const VTarget good = GoodTarget(VTarget::ETargetType(type));
+		const auto step = [&](auto VTarget::*i_pList)
+		{
+			order.push_back(TargetMessages(type, [&](VTarget& io_rTarget) { io_rTarget = bad; }).back());
+			bad.*i_pList = good.*i_pList;
+		};
+		const bool bDirection = type == VTarget::ELocalDirectionToWorldDirection;
+		const bool bRotation = bDirection || type == VTarget::ELocalRotationToWorldRotation;
+		if (bDirection)
+		{
+			step(&VTarget::m_SegmentIndices);
+			step(&VTarget::m_State);
+		}
+		step(&VTarget::m_MarkerIndices);
+		if (!bRotation)
+			step(&VTarget::m_RotationObservationIndices);
+		if (!bDirection)
+		{
+			step(&VTarget::m_SegmentIndices);
+			step(&VTarget::m_State);
+		}
+		if (*rMessages.m_pCovariance)
+			step(&VTarget::m_Covariance);
+		step(&VTarget::m_ViewNormals);
+		VTexts expected = bDirection
+		    ? VTexts{rMessages.m_pSegments, rMessages.m_pState, rMessages.m_pMarkers, rMessages.m_pCovariance}
+		    : VTexts{rMessages.m_pMarkers, rMessages.m_pRotations, rMessages.m_pSegments, rMessages.m_pState,
+		        rMessages.m_pCovariance};
+		if (bRotation && !bDirection)
+			expected.erase(expected.begin() + 1);
+		std::erase(expected, "");
+		expected.push_back("Invalid target view normals");
+		EXPECT_EQ(order, expected);
+	}
 }
 
 TEST_F(SubjectCheck, ValuesOfTargets)
@@ -142,38 +270,102 @@ TEST_F(SubjectCheck, ValuesOfTargets)
 	    {1, [](VTarget& io_r) { io_r.m_Type = VTarget::ETargetType(10); }, {"Unknown target type"}},
 	    {1, [](VTarget& io_r) { io_r.m_Type = VTarget::ETargetType(-1); }, {"Unknown target type"}},
 	    {2, [](VTarget& io_r) { io_r.m_Covariance[4] = -1; }, {covariance}},
+	    {2, [](VTarget& io_r) { io_r.m_Covariance[1] = 1e-11; }, {covariance}},
+	    {2, [](VTarget& io_r) { io_r.m_Covariance[8] = c_NaN; }, {covariance}},
 	    {7, [](VTarget& io_r) { io_r.m_Covariance[36] = -1; }, {covariance}},
 	    {7, [](VTarget& io_r) { io_r.m_Covariance[62] = c_Infinity; }, {covariance}},
 	    {8, [](VTarget& io_r) { io_r.m_RotationCalibrationBehaviour = VTarget::EBadBehaviourType; },
 	        {"Invalid rotation calibration behaviour"}},
 	    {8, [](VTarget& io_r) { io_r.m_RotationTargetOrientation.resize(3); },
 	        {"Incorrect rotation target orientation size. Expected 0. Actual 3"}},
-	    {8, [](VTarget& io_r) { io_r.m_RotationCalibrationBehaviour = VTarget::EHingeLike; },
+	    {8,
+	        [](VTarget& io_r)
+	        {
+		        io_r.m_RotationCalibrationBehaviour = VTarget::EHingeLike;
+		        io_r.m_RotationTargetOrientation.resize(2);
+	        },
+	        {"Incorrect rotation target orientation size. Expected 3. Actual 2 "}},
+	    {8, [](VTarget& io_r) { io_r.m_RotationCalibrationBehaviour = VTarget::ERotationCalibrationBehaviourType(9); },
 	        {"Incorrect rotation target orientation size. Expected 3. Actual 0 "}},
-	    {9, [](VTarget& io_r) { io_r.m_State[2] = 1.001; }, {unit}},
-	    {9, [](VTarget& io_r) { io_r.m_State[2] = 0.999; }, {unit}},
-	    {9, [](VTarget& io_r) { io_r.m_State[1] = c_NaN; }, {unit}},
-	    {1, [](VTarget& io_r) { io_r.m_ViewNormals[0][1] = 1 + 2e-6; }, {normals}},
-	    {1, [](VTarget& io_r) { io_r.m_ViewNormals[0][2] = c_NaN; }, {normals}},
+	    {9,
+	        [](VTarget& io_r) {
+		        io_r.m_State = {1.001, 0, 0};
+	        },
+	        {unit}},
+	    {9,
+	        [](VTarget& io_r) {
+		        io_r.m_State = {0.999, 0, 0};
+	        },
+	        {unit}},
+	    {9,
+	        [](VTarget& io_r) {
+		        io_r.m_State = {0, c_NaN, 1};
+	        },
+	        {unit}},
+	    {9,
+	        [](VTarget& io_r) {
+		        io_r.m_State = {0, 1e200, 0};
+	        },
+	        {unit}},
+	    {1, [](VTarget& io_r) { io_r.m_MarkerIndices = {4}; }, {"Out of range marker index 4"}},
+	    {0,
+	        [](VTarget& io_r) {
+		        io_r.m_MarkerIndices = {3, 0xFFFFFFFF};
+	        },
+	        {"Out of range marker index 4294967295"}},
+	    {8, [](VTarget& io_r) { io_r.m_RotationObservationIndices = {2}; },
+	        {"Out of range rotation observation index 2"}},
+	    {1, [](VTarget& io_r) { io_r.m_SegmentIndices = {2}; }, {"Out of range segment index 2"}},
+	    {0,
+	        [](VTarget& io_r)
+	        {
+		        io_r.m_MarkerIndices = {9};
+		        io_r.m_RotationObservationIndices = {9};
+		        io_r.m_SegmentIndices = {9};
+	        },
+	        {"Out of range marker index 9"}},
+	    {0,
+	        [](VTarget& io_r)
+	        {
+		        io_r.m_RotationObservationIndices = {9};
+		        io_r.m_SegmentIndices = {9};
+	        },
+	        {"Out of range rotation observation index 9"}},
+	    {0,
+	        [](VTarget& io_r)
+	        {
+		        io_r.m_SegmentIndices = {9};
+		        io_r.m_ViewNormals.resize(1);
+	        },
+	        {"Out of range segment index 9"}},
+	    {1, [](VTarget& io_r) { io_r.m_ViewNormals.clear(); }, {normals}},
+	    {1, [](VTarget& io_r) { io_r.m_ViewNormals.resize(2); }, {normals}},
+	    {1,
+	        [](VTarget& io_r) {
+		        io_r.m_ViewNormals[0] = {0.5, 0, 0};
+	        },
+	        {normals}},
+	    {1,
+	        [](VTarget& io_r) {
+		        io_r.m_ViewNormals[0] = {0, 1 + 2e-6, 0};
+	        },
+	        {normals}},
+	    {1,
+	        [](VTarget& io_r) {
+		        io_r.m_ViewNormals[0] = {0, 0, c_NaN};
+	        },
+	        {normals}},
+	    {8,
+	        [](VTarget& io_r) {
+		        io_r.m_RotationObservationIndices = {0, 2};
+	        },
+	        {"Incorrect number of rotation observations, ElocalRotationToWorldRotation type expects 1 rotation "
+	         "observation",
+	            "Out of range rotation observation index 2"}},
 	};
 	for (const auto& rRow : rows)
 		EXPECT_EQ(TargetMessages(rRow.m_Type, rRow.m_pChange), rRow.m_Messages) << "row " << &rRow - rows;
 	EXPECT_EQ(Failing([] { return CheckTarget(GoodSubject(), 10); }), VTexts{"Out-of-range target index 10"});
-
-	// Indices, and that they come before the view normals.
-	VTarget bad;
-	bad.m_MarkerIndices = {3, 4};
-	bad.m_RotationObservationIndices = {2};
-	bad.m_SegmentIndices = {0xFFFFFFFF};
-	bad.m_ViewNormals.resize(7);
-	for (const auto& [pIndices, message] : {std::pair{&VTarget::m_MarkerIndices, "Out of range marker index 4"},
-	         {&VTarget::m_RotationObservationIndices, "Out of range rotation observation index 2"},
-	         {&VTarget::m_SegmentIndices, "Out of range segment index 4294967295"},
-	         {&VTarget::m_SegmentIndices, "Invalid target view normals"}})
-	{
-		EXPECT_EQ(TargetMessages(0, [&](VTarget& io_rTarget) { io_rTarget = bad; }), VTexts{message});
-		(bad.*pIndices).clear();
-	}
 }
 
 TEST_F(SubjectCheck, AllDuplicatesOfMarkersAreTold)
@@ -250,35 +442,53 @@ TEST_F(SubjectCheck, JointsTellEverything)
 
 TEST_F(SubjectCheck, PlacesOfSegments)
 {
-	constexpr std::uint32_t c_None = CoreOrlexTypes::c_NoParent;
 	const struct
 	{
-		/// Index, parent and depth of the root and of its child.
-		std::uint32_t m_Places[2][3];
+		void (*m_pChange)(std::vector<VSubject::VSegment>&);
 		const char* m_pMessage;
 	} rows[] = {
-	    {{{0, c_None, 0}, {2, 0, 1}}, "Inconsistent segment index."},
-	    {{{0, 0, 0}, {1, 0, 1}}, "The parent segment of the root segment must not be set."},
-	    {{{0, c_None, 1}, {1, 0, 1}}, "The tree depth of the root must be equal to 0."},
-	    {{{0, c_None, 0}, {1, c_None, 1}}, "The parent segment of a child segment must be set."},
-	    {{{0, c_None, 0}, {1, 2, 1}}, "Out-of-range parent segment index."},
-	    {{{0, c_None, 0}, {1, 1, 1}}, "The segments are not in depth-first order."},
-	    {{{0, c_None, 0}, {1, 0, 2}}, "The tree depth of a child must be equal to the parent depth + 1"},
-	    {{{0, c_None, 0}, {1, 0, 0}}, "The tree depth of a child must be equal to the parent depth + 1"},
+	    {[](auto& io_r) { io_r[1].m_SegmentIndex = 2; }, "Inconsistent segment index."},
+	    {[](auto& io_r) { io_r[0].m_ParentSegmentIndex = 0; },
+	        "The parent segment of the root segment must not be set."},
+	    {[](auto& io_r) { io_r[0].m_TreeDepth = 1; }, "The tree depth of the root must be equal to 0."},
+	    {[](auto& io_r) { io_r[1].m_ParentSegmentIndex = CoreOrlexTypes::c_NoParent; },
+	        "The parent segment of a child segment must be set."},
+	    {[](auto& io_r) { io_r[1].m_ParentSegmentIndex = 2; }, "Out-of-range parent segment index."},
+	    {[](auto& io_r) { io_r[1].m_ParentSegmentIndex = 1; }, "The segments are not in depth-first order."},
+	    {[](auto& io_r) { io_r[1].m_TreeDepth = 2; },
+	        "The tree depth of a child must be equal to the parent depth + 1"},
+	    {[](auto& io_r) { io_r[1].m_TreeDepth = 0; },
+	        "The tree depth of a child must be equal to the parent depth + 1"},
 	    // In the order in which they are looked for.
-	    {{{1, 0, 1}, {1, 0, 1}}, "Inconsistent segment index."},
-	    {{{0, 0, 1}, {1, 0, 1}}, "The parent segment of the root segment must not be set."},
-	    {{{0, c_None, 0}, {7, 7, 7}}, "Inconsistent segment index."},
+	    {[](auto& io_r)
+	        {
+		        io_r[0].m_SegmentIndex = 1;
+		        io_r[0].m_ParentSegmentIndex = 0;
+	        },
+	        "Inconsistent segment index."},
+	    {[](auto& io_r)
+	        {
+		        io_r[0].m_ParentSegmentIndex = 0;
+		        io_r[0].m_TreeDepth = 1;
+	        },
+	        "The parent segment of the root segment must not be set."},
+	    {[](auto& io_r)
+	        {
+		        io_r[1].m_SegmentIndex = 7;
+		        io_r[1].m_ParentSegmentIndex = 7;
+	        },
+	        "Inconsistent segment index."},
+	    {[](auto& io_r)
+	        {
+		        io_r[0].m_SegmentIndex = 3;
+		        io_r[0].m_Joint.m_Mean.resize(1);
+	        },
+	        "Incorrent 'Mean' vector size."},
 	};
 	for (const auto& rRow : rows)
 	{
 		VSubject subject = GoodSubject();
-		for (std::size_t i = 0; i < 2; ++i)
-		{
-			subject.m_Segments[i].m_SegmentIndex = rRow.m_Places[i][0];
-			subject.m_Segments[i].m_ParentSegmentIndex = rRow.m_Places[i][1];
-			subject.m_Segments[i].m_TreeDepth = rRow.m_Places[i][2];
-		}
+		rRow.m_pChange(subject.m_Segments);
 		EXPECT_EQ(Failing([&] { return CheckSubject(subject); }), VTexts{rRow.m_pMessage}) << "row " << &rRow - rows;
 	}
 }
