@@ -121,4 +121,17 @@ TEST(JointFK, WrongTypesAreRefused)
 	EXPECT_THROW(JointFKFactory(VJointTypes::EFree)->Create(Joint(VJointTypes::EBadJointType)), VConstructionException);
 }
 
+TEST(JointFK, CloneHoldsItsOwnState)
+{
+	const auto pJoint = Create(Joint(VJointTypes::ESlider));
+	const double values[] = {1.0, 2.0};
+	const double* pState = values;
+	pJoint->ComputeJointFK().SetState(pState);
+	const auto pClone = pJoint->Clone();
+	pJoint->ComputeJointFK().SetState(pState);
+	Rotation::VPose<double> pose;
+	pClone->ComputeJointFK().GetPose(pose);
+	EXPECT_EQ(pose.t[2], 1.0);
+}
+
 } // namespace

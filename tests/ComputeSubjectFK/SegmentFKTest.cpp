@@ -13,6 +13,18 @@ namespace
 using namespace ComputeSubject;
 using namespace Reference;
 
+TEST(SegmentFK, FreeRootAtZeroIsExactlyTheIdentity)
+{
+	VSubject subject;
+	subject.m_Segments = {Segment(c_NoParent, VJointTypes::EFree)};
+	VComputeSubjectFK fk(subject);
+	ASSERT_EQ(fk.NumberOfStates(), 6u);
+	const double state[6]{};
+	fk.Update(state);
+	EXPECT_EQ(fk.Segment(0).WorldPose().R, Rotation::c_Identity3);
+	EXPECT_EQ(fk.Segment(0).WorldPose().t, (Rotation::VVector3{}));
+}
+
 TEST(SegmentFK, HingeTurnsAboutTheAxisThatZTurnsInto)
 {
 	// A quarter turn about X carries Z to -Y, so that the hinge turns X towards Z.

@@ -1,4 +1,3 @@
-#include "../CoreOrlexTypes/Damage.h"
 #include "ReferenceFK.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
@@ -176,15 +175,31 @@ TEST(SubjectFK, CloneToAParentOfAnotherDepthIsAsserted)
 TEST(SubjectFK, BrokenSubjectsAreRefusedOrUsable)
 {
 	std::mt19937 random(13);
-	VDamage damage(14);
+	const auto below = [&](std::uint32_t i_Limit)
+	{ return std::uniform_int_distribution<std::uint32_t>(0, i_Limit - 1)(random); };
 	const VAssertions assertions;
 	int refused = 0;
 	int usable = 0;
 	for (int i = 0; i < 5000; ++i)
 	{
 		VSubject subject = WithTargets(random);
-		damage.Change(subject.m_Targets, damage.Below(4));
-		damage.Change(subject.m_Segments, damage.Below(20));
+		for (std::uint32_t damage = 1 + below(3); damage > 0; --damage)
+		{
+			VSubject::VSegment& rSegment = subject.m_Segments[below(20)];
+			VTarget& rTarget = subject.m_Targets[below(5)];
+			switch (below(9))
+			{
+			case 0: rSegment.m_ParentSegmentIndex = below(25); break;
+			case 1: rSegment.m_Joint.m_JointType = static_cast<Reference::EJointType>(below(9)); break;
+			case 2: rSegment.m_PreRotation[below(3)] = std::nan(""); break;
+			case 3: rTarget.m_Type = static_cast<VTarget::ETargetType>(below(12)); break;
+			case 4: rTarget.m_State.resize(below(14), 1e300); break;
+			case 5: rTarget.m_MarkerIndices.assign(below(4), below(2) ? 0xFFFFFFFF : 1); break;
+			case 6: rTarget.m_RotationObservationIndices.assign(below(3), below(2) ? 0xFFFFFFFF : 0); break;
+			case 7: rTarget.m_SegmentIndices.assign(below(3), below(25)); break;
+			default: rTarget.m_Weight = below(2) ? -1.0 : std::nan(""); break;
+			}
+		}
 		try
 		{
 			VComputeSubjectFK fk(subject);

@@ -77,6 +77,11 @@ struct VMessageRow
 	std::uint32_t m_Id = c_TestId;
 };
 
+void PrintTo(const VMessageRow& i_rRow, std::ostream* o_pStream)
+{
+	*o_pStream << i_rRow.m_Text;
+}
+
 const VTexts c_None;
 
 const std::vector<VMessageRow> c_MessageRows{
@@ -117,6 +122,12 @@ const std::vector<VMessageRow> c_MessageRows{
         {"Parameter element missing required attribute NAME"}},
     {"ParameterWithoutNumber", Document({{"Parameters", "<Parameters><Parameter NAME='p' VALUE='1,5'/></Parameters>"}}),
         {"Parameter node's VALUE attribute could not be interpreted"}},
+    {"NumberOverflows", Document({{"Parameters", "<Parameters><Parameter NAME='p' VALUE='1e999'/></Parameters>"}}),
+        {"Parameter node's VALUE attribute could not be interpreted"}},
+    {"NotANumber", Document({{"Parameters", "<Parameters><Parameter NAME='p' VALUE='nan'/></Parameters>"}}),
+        {"Parameter node's VALUE attribute could not be interpreted"}},
+    {"NumberUnderflows", Document({{"Parameters", "<Parameters><Parameter NAME='p' VALUE='1e-400'/></Parameters>"}}),
+        c_None},
     {"BoolOtherwiseSpelt",
         Document({{"Parameters", "<Parameters><Parameter NAME='p' VALUE='1' HIDDEN='True'/></Parameters>"}}),
         {"Parameter node's HIDDEN attribute could not be interpreted"}},
@@ -155,6 +166,12 @@ const std::vector<VMessageRow> c_MessageRows{
         {"Ignoring unrecognised attribute: //KinematicModel/Skeleton/Segment/Segment/JointDummy/X"}},
     {"ColourOfTwo", Segments("<Segment NAME='Root' RGB='1 2'><JointDummy/></Segment>"),
         {"Segment node's RGB attribute had incorrect number of components"}},
+    {"ColourNegative", Segments("<Segment NAME='Root' RGB='1 2 -3'><JointDummy/></Segment>"),
+        {"Segment node's RGB attribute could not be interpreted"}},
+    {"BoundsOfFive", Segments("<Segment NAME='Root' BOUNDS='1 2 3 4 5'><JointDummy/></Segment>"),
+        {"Segment node's BOUNDS attribute had incorrect number of components"}},
+    {"DrawStyleUnknown", Segments("<Segment NAME='Root' DRAW-STYLE='ball'><JointDummy/></Segment>"),
+        {"Segment node's DRAW-STYLE attribute could not be interpreted"}},
     {"BoundsDoNotParse", Segments("<Segment NAME='Root' BOUNDS='0 0 0 0 0 (1'><JointDummy/></Segment>"),
         {"Parse Error at column 3: Unbalanced parentheses", "Failed validating one or more Expressions"},
         {"Segment 'Root' has the invalid expression '(1'"}},
@@ -202,6 +219,10 @@ const std::vector<VMessageRow> c_MessageRows{
         {"Marker M is using unknown segment Arm"}, {"File contains unknown IDREF : Arm "}},
     {"MarkerInNewFileWithSegment", Document({{"Markers", "<Marker NAME='M' SEGMENT='Root'/>"}}), c_None,
         {"Ignoring SEGMENT attribute in Marker element. Not supported in files with version 3.5"}},
+    {"MarkerStatusUnknown", Document({{"Markers", "<Marker NAME='M' STATUS='gone'/>"}}),
+        {"Marker node's STATUS attribute could not be interpreted"}},
+    {"OldMarkerPositionOfTwo", OldMarkers("<Marker NAME='M' SEGMENT='Root' POSITION='1 2'/>"),
+        {"Marker node's POSITION attribute had incorrect number of components"}},
     {"OldMarkerStateDoesNotParse", OldMarkers("<Marker NAME='M' SEGMENT='Root' POSITION='1 2 x'/>"), c_None,
         {"Target 'M' has the invalid state expression 'x': Parse Error at column 2: ID \"x\" was referenced but never "
          "declared"}},
@@ -244,6 +265,8 @@ const std::vector<VMessageRow> c_MessageRows{
     {"PairSkew", Turn("AXIS-PAIR='1 0 0 1 1 0'"), {" Target 't'AXIS-PAIR has non-orthogonal axes"}},
     {"AxisZero", Turn("AXIS='0 0 0'"), {" Target 't' AXIS or AXIS-PAIR has a 0-magnitude vector"}},
     {"PairZero", Turn("AXIS-PAIR='1 0 0 0 0 0'"), {" Target 't' AXIS or AXIS-PAIR has a 0-magnitude vector"}},
+    {"AxisOfTwo", Turn("AXIS='1 0'"),
+        {"TargetLocalRotationToWorldRotation node's AXIS attribute had incorrect number of components"}},
     {"DirectionNotUnit",
         Targets("<TargetLocalDirectionToWorldDirection HIDDEN='false' SEGMENT='Root' WEIGHT='1' "
                 "DIRECTION-OBSERVATION='o' DIRECTION='0 0 1.1'/>"),
@@ -282,16 +305,19 @@ const std::vector<VMessageRow> c_MessageRows{
             "'SubjectDynamicSubspace' declared but does not contain any valid 'PcaControlledParams' elements"}},
 };
 
-TEST(Reader, TellsWhatItFinds)
+class ReaderMessage : public testing::TestWithParam<VMessageRow>
 {
-	for (const VMessageRow& rRow : c_MessageRows)
-	{
-		SCOPED_TRACE(rRow.m_pName);
-		const VContent content = ReadText(rRow.m_Text, rRow.m_Id);
-		EXPECT_EQ(content.m_Errors, rRow.m_Errors);
-		EXPECT_EQ(content.m_Warnings, rRow.m_Warnings);
-		EXPECT_EQ(content.m_bRead, rRow.m_Errors.empty());
-	}
+};
+
+INSTANTIATE_TEST_SUITE_P(
+    Reader, ReaderMessage, testing::ValuesIn(c_MessageRows), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
+
+TEST_P(ReaderMessage, IsTold)
+{
+	const VContent content = ReadText(GetParam().m_Text, GetParam().m_Id);
+	EXPECT_EQ(content.m_Errors, GetParam().m_Errors);
+	EXPECT_EQ(content.m_Warnings, GetParam().m_Warnings);
+	EXPECT_EQ(content.m_bRead, GetParam().m_Errors.empty());
 }
 
 } // namespace

@@ -34,6 +34,16 @@ protected:
 	std::string m_Error;
 };
 
+TEST_F(StaticExpressionParser, AddsInOrder)
+{
+	ASSERT_TRUE(m_Parser.AddStaticParameter("Arm", 3.0, m_Error));
+	ASSERT_TRUE(m_Parser.AddStaticParameter("Area", "Arm^2*cos(0)", m_Error)) << m_Error;
+	ASSERT_TRUE(m_Parser.AddStaticParameter("Empty", "", m_Error));
+	EXPECT_EQ(Value("Area+1"), 10.0);
+	EXPECT_EQ(Value("Empty"), 0.0);
+	EXPECT_EQ(Value(""), 0.0);
+}
+
 TEST_F(StaticExpressionParser, TellsWhatItCannotAddOrSetAndChangesNothing)
 {
 	ASSERT_TRUE(m_Parser.AddStaticParameter("Arm", 3.0, m_Error));

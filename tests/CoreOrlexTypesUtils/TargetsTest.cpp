@@ -173,6 +173,45 @@ TEST(PruneToActive, DropsABodyOfTooFewMarkersAndExpectsFewerRotations)
 	EXPECT_TRUE(appData.m_Targets.empty());
 }
 
+TEST(TargetOrder, StaysInStepOverRandomSubjects)
+{
+	VMessageLog log;
+	for (unsigned seed = 0; seed < 200; ++seed)
+	{
+		VRandomSubject random(seed);
+		VSubjectParametrised subject;
+		VSubjectApplicationData appData;
+		random.Make(subject, appData);
+		for (std::size_t i = 0; i < subject.m_Targets.size(); ++i)
+			subject.m_Targets[i].m_NumberOfDegreesOfFreedom = std::uint32_t(i),
+			appData.m_Targets[i].m_Name = std::to_string(i);
+		const VSubjectParametrised before = subject;
+		MakeOneTargetPerMarker(subject, appData);
+		EXPECT_TRUE(CoreOrlexTypesUtils::CheckSubjectParametrised(subject));
+		ASSERT_EQ(appData.m_Targets.size(), subject.m_Targets.size());
+		for (std::size_t i = 0; i < subject.m_Targets.size(); ++i)
+		{
+			const std::uint32_t old = subject.m_Targets[i].m_NumberOfDegreesOfFreedom;
+			EXPECT_EQ(appData.m_Targets[i].m_Name, std::to_string(old));
+			EXPECT_EQ(subject.m_Targets[i].m_StateExpressions, before.m_Targets[old].m_StateExpressions);
+		}
+		std::vector<std::pair<std::uint32_t, std::uint32_t>> firsts;
+		for (const VTarget& rTarget : subject.m_Targets)
+			if (rTarget.m_Type <= VTarget::ELocalPointToWorldPointGaussian)
+				firsts.emplace_back(rTarget.m_MarkerIndices[0], rTarget.m_NumberOfDegreesOfFreedom);
+		EXPECT_TRUE(std::is_sorted(firsts.begin(), firsts.end()));
+		for (const VTarget& rTarget : before.m_Targets)
+		{
+			const auto isItsFirst = [&](const auto& i_rFirst) {
+				return i_rFirst.first == rTarget.m_MarkerIndices[0]
+				    && i_rFirst.second <= rTarget.m_NumberOfDegreesOfFreedom;
+			};
+			const bool bPoint = rTarget.m_Type <= VTarget::ELocalPointToWorldPointGaussian;
+			EXPECT_EQ(bPoint ? std::count_if(firsts.begin(), firsts.end(), isItsFirst) : 1, 1);
+		}
+	}
+}
+
 TEST(JointParameters, CarryStatisticsByName)
 {
 	VMessageLog log;

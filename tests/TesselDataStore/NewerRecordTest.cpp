@@ -111,6 +111,15 @@ TEST(NewerRecord, AnOlderOneLeavesDefaults)
 	EXPECT_EQ(read, (VNew{{part}, EColourNew::ERed, 7, {}}));
 }
 
+TEST(NewerRecord, CutAnywhereIsRefused)
+{
+	const NVX::IO::VVariant whole = ToVariant(New());
+	VOld old;
+	for (std::size_t size = 0; size < whole.m_Bytes.size(); ++size)
+		EXPECT_FALSE(FromVariant({whole.m_pSchema, whole.m_Bytes.substr(0, size)}, old)) << size;
+	EXPECT_EQ(old, VOld());
+}
+
 TEST(NewerRecord, ANameThatIsUnknownHereIsNoValue)
 {
 	VNew value = New();
@@ -125,6 +134,14 @@ TEST(NewerRecord, AMemberThatChangedItsTypeIsRefused)
 	schema.m_Children[1].m_pSchema = TesselDataStore::SchemaOf<std::uint64_t>();
 	VPartOld part;
 	EXPECT_FALSE(FromVariant({GetUniqueSchema(schema), ToVariant(VPartOld()).m_Bytes}, part));
+}
+
+TEST(NewerRecord, UnknownNeighboursAreSkippedInOneMove)
+{
+	const auto pReader = TesselDataStore::Detail::MakeReader<VPartOld>(*TesselDataStore::SchemaOf<VPartNew>());
+	const auto& rRecord = dynamic_cast<const TesselDataStore::Detail::VReadRecord&>(*pReader);
+	// Tags, Name, Flags with Place, Length, Curve.
+	EXPECT_EQ(rRecord.m_Steps.size(), 5u);
 }
 
 } // namespace

@@ -41,6 +41,12 @@ TEST(Schema, DescribesItsOwnEnumerations)
 	EXPECT_EQ(Names(rRoles),
 	    (std::vector<std::string>{
 	        "Value", "Function", "Callback", "Input", "InputOutput", "Output", "Return", "Result"}));
+	const char* const docs[] = {"An object or value", "A function specification", "A callback specification",
+	    "An input parameter within a function", "An input and output parameter within a function",
+	    "An output parameter within a function", "A return value from function",
+	    "A return value from a function that is a result code (may be used by API generation)"};
+	for (std::size_t index = 0; index < std::size(docs); ++index)
+		EXPECT_EQ(rRoles.m_Children[index].m_Doc, docs[index]);
 	EXPECT_EQ(int(ERole::EResult), 7);
 }
 

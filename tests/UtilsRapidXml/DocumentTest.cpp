@@ -174,6 +174,17 @@ TEST(Document, PrintsAsRapidXmlDoes)
 
 /// Whatever happens to a file's bytes, it parses or gives an error with a line; under the sanitizers this also shows
 /// that the parser never leaves its buffer.
+TEST(Document, WritesLineEndsAndTabsAsReferences)
+{
+	const std::string text = "\tone\r\ntwo <&> \"three\" 'four' \xC3\xA4";
+	VDocument document;
+	document.AppendDeclaration();
+	document.AppendAttribute(document.AppendElement(document.GetRoot(), "a"), "b", text);
+	EXPECT_EQ(document.Print(),
+	    "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\"?>\n"
+	    "<a b='&#9;one&#13;&#10;two &lt;&amp;&gt; \"three\" &apos;four&apos; \xC3\xA4'/>\n\n");
+}
+
 TEST(Document, SurvivesDamage)
 {
 	const std::string whole = "<?xml version='1.0'?>\n<!-- c --><a b='&#65;&amp;' c=\"1 2\">\n\t<d e=''/>t<![CDATA[x]]>"

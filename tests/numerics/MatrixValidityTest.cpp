@@ -66,6 +66,12 @@ TEST(MatrixValidity, OfOtherSizes)
 	EXPECT_EQ(FaultAsDefinite(two, 2), EFault::ENone);
 	two[3] = 3;
 	EXPECT_EQ(FaultAsDefinite(two, 2), EFault::EEigenvalue);
+	std::array<double, 16> four{};
+	for (std::size_t i = 0; i < 4; ++i)
+		four[5 * i] = 1.0;
+	EXPECT_EQ(FaultAsDefinite(four, 4), EFault::ENone);
+	four[15] = -1.0;
+	EXPECT_EQ(FaultAsDefinite(four, 4), EFault::EEigenvalue);
 }
 
 } // namespace

@@ -75,14 +75,22 @@ TEST(Usage, EditsThatNameWhatIsNotThere)
 	RunRows({
 	    {"source name", Create({"--position", "Hisp:Hips"}), 2, "",
 	        "error retarget: there is no source segment \"Hisp\"; did you mean \"Hips\", "},
+	    {"target name", Create({"--rotation", "Hips:pelvis"}), 2, "",
+	        "there is no target segment \"pelvis\"; did you mean "},
 	    {"second edit", Create({"--rotation", "Hips:Hips", "--rotation", "Head:Haed"}), 2, "",
 	        "there is no target segment \"Haed\"; did you mean \"Head\", "},
+	    {"index", Create({"--position", "#31:#0"}), 2, "",
+	        "there is no source segment #31; they go from #0 to #30, the last is \"RThumb\""},
+	    {"no pair", Create({"--position", "Hips"}), 2, "", "\"Hips\" is not SOURCE:TARGET"},
 	    {"no source", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--position", "Hips:Hips"}, 2, "",
 	        "--position needs the performer's skeleton: give it with --source FILE.qrs"},
 	    {"no source to update", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--update-targets"}, 2, "",
 	        "--update-targets needs the performer's skeleton"},
 	    {"no targets", Create({"--remove-target", "0"}), 2, "", "there is no target #0; there is no target at all"},
+	    {"target index", Create({"--position", "Hips:Hips", "--weight", "1=2"}), 2, "",
+	        "there is no target #1; they go from #0 to #0"},
 	    {"root name", Create({"--root", "Hip"}), 2, "", "there is no bone \"Hip\"; did you mean \"Hips\""},
+	    {"root index", Create({"--root", "34"}), 2, "", "there is no bone #34; they go from #0 to #33"},
 	    {"empty root", Create({"--root", ""}), 2, "", "there is no bone \"\""},
 	});
 }
@@ -92,15 +100,21 @@ TEST(Usage, EditsWithUnfitValues)
 	RunRows({
 	    {"scale 0", Create({"--scale", "0"}), 2, "", "--scale: a scale must be above 0: 0"},
 	    {"scale -1", Create({"--scale", "-1"}), 2, "", "--scale: a scale must be above 0: -1"},
+	    {"scale nan", Create({"--scale", "nan"}), 2, "", "--scale: \"nan\" is not a finite number"},
+	    {"scale overflow", Create({"--scale", "1e999"}), 2, "", "--scale: \"1e999\" is not a finite number"},
 	    {"scale word", Create({"--scale", "big"}), 2, "", "--scale: \"big\" is not a finite number"},
+	    {"scale in German", Create({"--scale", "1,5"}), 2, "", "--scale: \"1,5\" is not a finite number"},
 	    {"weight", Create({"--position", "Hips:Hips", "--weight", "0=-1"}), 2, "", "a weight cannot be negative: -1"},
 	    {"weight form", Create({"--position", "Hips:Hips", "--weight", "0"}), 2, "", "\"0\" is not TARGET=WEIGHT"},
 	    {"state count", Create({"--position", "Hips:Hips", "--state", "0=1,2"}), 2, "",
 	        "--state: \"1,2\" is not three numbers"},
+	    {"state word", Create({"--position", "Hips:Hips", "--state", "0=1,2,x"}), 2, "",
+	        "--state: \"x\" is not a finite number"},
 	    {"pose count", Create({"--pose", "LeftArm=1,2"}), 2, "", "the joint of \"LeftArm\" takes 3 numbers, not 2"},
 	    {"pose of the root", Create({"--pose", "Hips=1,2,3,4"}), 2, "", "takes 3 or 6 numbers, not 4"},
 	    {"pose without joint", Create({"--prune-joints", "--pose", "LeftArm=1,2,3"}), 2, "",
 	        "--pose: \"LeftArm\" has no joint that could move"},
+	    {"pose of nothing", Create({"--pose", "Lefty=1,2,3"}), 2, "", "there is no target segment \"Lefty\""},
 	});
 }
 
