@@ -7,7 +7,6 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
-#include <optional>
 
 using namespace CoreGraphics;
 using GraphicsTest::ExpectNear;
@@ -49,27 +48,19 @@ protected:
 
 } // namespace
 
-TEST_F(CameraController, BeginsWithTheWholeStageAndGoesBackToItOrNear)
+TEST_F(CameraController, BeginsWithTheWholeStage)
 {
+	EXPECT_EQ(m_Camera.m_Near, 1.0f);
+	EXPECT_EQ(m_Camera.m_Far, 100000.0f);
+	EXPECT_EQ(m_Camera.m_FieldOfView, 45.0f);
+	EXPECT_EQ(m_Camera.m_Pitch, -60.0f);
+	EXPECT_EQ(m_Camera.m_Yaw, 45.0f);
+	EXPECT_EQ(m_Camera.m_Distance, 7000.0f);
+	EXPECT_EQ(m_Camera.m_OrthographicScale, 4.0f);
+	EXPECT_EQ(m_Camera.m_Centre, QVector3D());
+	EXPECT_TRUE(m_Camera.m_FrameOfReference.isIdentity());
 	EXPECT_EQ(m_Camera.m_Type, ECameraPerspective);
 	EXPECT_FALSE(m_Camera.m_bYUp);
-	for (const std::optional<bool> close : {std::optional<bool>(), {true}, {false}})
-	{
-		if (close)
-		{
-			m_Camera.m_Centre = QVector3D(1, 2, 3);
-			m_Camera.m_OrthographicScale = 9.0f;
-			m_Camera.m_FrameOfReference.translate(1, 2, 3);
-			m_Camera.Reset(*close);
-		}
-		const bool bClose = close.value_or(false);
-		EXPECT_EQ(m_Camera.m_Pitch, bClose ? -90.0f : -60.0f);
-		EXPECT_EQ(m_Camera.m_Yaw, bClose ? 0.0f : 45.0f);
-		EXPECT_EQ(m_Camera.m_Distance, bClose ? 1000.0f : 7000.0f);
-		EXPECT_EQ(m_Camera.m_OrthographicScale, 4.0f);
-		EXPECT_EQ(m_Camera.m_Centre, QVector3D());
-		EXPECT_TRUE(m_Camera.m_FrameOfReference.isIdentity());
-	}
 }
 
 TEST_F(CameraController, PerspectiveLooksFromASphereRoundTheCentre)
@@ -231,6 +222,23 @@ TEST_F(CameraController, DollyAndWheelStayWithinTheirLimits)
 	m_Camera.Wheel(120);
 	m_Camera.Update();
 	EXPECT_EQ(m_Camera.m_Projection, projection);
+}
+
+TEST_F(CameraController, ResetGoesNearOrFar)
+{
+	for (const bool bClose : {true, false})
+	{
+		m_Camera.m_Centre = QVector3D(1, 2, 3);
+		m_Camera.m_OrthographicScale = 9.0f;
+		m_Camera.m_FrameOfReference.translate(1, 2, 3);
+		m_Camera.Reset(bClose);
+		EXPECT_EQ(m_Camera.m_Pitch, bClose ? -90.0f : -60.0f);
+		EXPECT_EQ(m_Camera.m_Yaw, bClose ? 0.0f : 45.0f);
+		EXPECT_EQ(m_Camera.m_Distance, bClose ? 1000.0f : 7000.0f);
+		EXPECT_EQ(m_Camera.m_OrthographicScale, 4.0f);
+		EXPECT_EQ(m_Camera.m_Centre, QVector3D());
+		EXPECT_TRUE(m_Camera.m_FrameOfReference.isIdentity());
+	}
 }
 
 TEST_F(CameraController, FitFillsTheViewToTheMargin)

@@ -2,6 +2,7 @@
 
 #include "CoreGraphics/Buffers.h"
 #include "CoreGraphics/RenderContext.h"
+#include "CoreGraphics/SelectionId.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "CoreGraphics/ShaderProgram.h"
 #include "CoreGraphics/Shapes.h"
@@ -15,6 +16,8 @@
 #include <QOpenGLFramebufferObject>
 #include <QOpenGLShaderProgram>
 #include <QTemporaryDir>
+
+#include <cstddef>
 
 using namespace CoreGraphics;
 using GraphicsTest::EDialect;
@@ -48,6 +51,62 @@ protected:
 INSTANTIATE_IN_BOTH_DIALECTS(RenderContext);
 
 } // namespace
+
+TEST(VertexFormat, LiesAsTheVerticesDo)
+{
+	EXPECT_EQ(offsetof(VVertexFormat::VEntry, m_Attribute), 0u);
+	EXPECT_EQ(offsetof(VVertexFormat::VEntry, m_Components), 1u);
+	EXPECT_EQ(offsetof(VVertexFormat::VEntry, m_Normalised), 2u);
+	EXPECT_EQ(offsetof(VVertexFormat::VEntry, m_Type), 4u);
+	EXPECT_EQ(offsetof(VVertexFormat::VEntry, m_Offset), 8u);
+	struct VRow
+	{
+		const VVertexFormat& m_rFormat;
+		std::vector<VVertexFormat::VEntry> m_Entries;
+		std::uint32_t m_Stride;
+	};
+	const VVertexFormat::VEntry position{EAttributePosition, 3, 0, GL_FLOAT, 0},
+	    normal{EAttributeNormal, 3, 0, GL_FLOAT, 12}, uv{EAttributeUV, 2, 0, GL_FLOAT, 24};
+	const VRow rows[] = {{VVertexFormat::Format2D(), {{EAttributePosition, 2, 0, GL_FLOAT, 0}}, 8},
+	    {VVertexFormat::Format3D(), {position}, 12},
+	    {VVertexFormat::PositionColour(), {position, {EAttributeColour, 4, 1, GL_UNSIGNED_BYTE, 12}}, 16},
+	    {VVertexFormat::PositionNormal(), {position, normal}, 24}, {VVertexFormat::Mesh(), {position, normal, uv}, 32},
+	    {VVertexFormat::Skin(),
+	        {position, normal, uv, {EAttributeBoneIndices, 4, 0, GL_UNSIGNED_BYTE, 32},
+	            {EAttributeBoneWeights, 4, 1, GL_UNSIGNED_BYTE, 36}},
+	        40}};
+	for (const VRow& rRow : rows)
+	{
+		EXPECT_EQ(rRow.m_rFormat.m_Entries, rRow.m_Entries);
+		EXPECT_EQ(rRow.m_rFormat.m_Stride, rRow.m_Stride);
+	}
+}
+
+TEST(SelectionId, IsAColour)
+{
+	const VSelectionId id = MakeSelectionId(0x5a0201);
+	EXPECT_FLOAT_EQ(id.m_Red, 1 / 255.0f);
+	EXPECT_FLOAT_EQ(id.m_Green, 2 / 255.0f);
+	EXPECT_FLOAT_EQ(id.m_Blue, 0x5a / 255.0f);
+	EXPECT_EQ(id.m_Id, 0x5a0201u);
+	EXPECT_EQ(offsetof(VSelectionId, m_Id), 12u);
+	EXPECT_EQ(MakeSelectionId(0xff000001).m_Blue, 0.0f);
+}
+
+TEST(RenderState, SelectionOverwritesAndTestsDepth)
+{
+	EXPECT_EQ(VRenderState().m_BlendConstant, 1.0f);
+	EXPECT_FALSE(VRenderState().m_bDepthTest);
+	EXPECT_TRUE(VRenderState().m_bDepthWrite);
+	EXPECT_TRUE(VRenderState().m_bColourWrite);
+	EXPECT_FALSE(VRenderState().m_bAlphaWrite);
+
+	const VRenderState from{
+	    EColourBlendAdd, EAlphaBlendReplace, ECullBack, EDepthGreater, 0.25f, false, false, false, true};
+	const VRenderState expected{
+	    EColourBlendOff, EAlphaBlendAdd, ECullBack, EDepthLessEqual, 1.0f, true, true, true, false};
+	EXPECT_EQ(MakeSelectionState(from), expected);
+}
 
 TEST_P(RenderContext, InitialiseSetsTheClearColour)
 {
@@ -272,6 +331,38 @@ TEST_P(RenderContext, FramebufferTexturesAreExactForPicks)
 		GL().glGetTexParameteriv(GL_TEXTURE_2D, GL_TEXTURE_MAG_FILTER, &filter);
 		EXPECT_EQ(filter, mode == ERenderNormal ? GL_LINEAR : GL_NEAREST);
 	}
+}
+
+TEST_P(RenderContext, BuffersAreUploadedAgainWhereNothingIsShared)
+{
+	VShape sphere = MakeSphere(1);
+	VUniform place("u_ReconPosAndSize"), colour("u_ModelColour");
+	const auto pProgram = m_Library.GetProgram("Sphere", "Colour");
+	const auto draw = [&](VRenderContext& io_rRender)
+	{
+		io_rRender.SetViewport(QRect(0, 0, c_Side, c_Side));
+		io_rRender.ClearBuffers(true, true);
+		EXPECT_TRUE(io_rRender.UseProgram(pProgram));
+		io_rRender.SetUniform(place, QVector4D(0, 0, 0, 1));
+		io_rRender.SetUniform(colour, QVector4D(0, 1, 0, 1));
+		io_rRender.BindVertices(sphere.m_Vertices);
+		io_rRender.DrawElements(GL_TRIANGLES, sphere.m_Indices);
+		std::vector<std::uint8_t> bytes;
+		io_rRender.ReadPixels(QRect(c_Side / 2, c_Side / 2, 1, 1), bytes);
+		EXPECT_EQ(bytes, (std::vector<std::uint8_t>{0, 255, 0, 255}));
+	};
+	draw(m_Render);
+	{
+		GraphicsTest::VOffscreenContext other(GetParam());
+		m_Library.InitialiseGL();
+		QOpenGLFramebufferObject target(c_Side, c_Side);
+		VRenderContext render;
+		render.Initialise();
+		render.BindFramebuffer(&target);
+		draw(render);
+		EXPECT_EQ(other.GL().glGetError(), static_cast<GLenum>(GL_NO_ERROR));
+	}
+	m_Context.MakeCurrent();
 }
 
 TEST_P(RenderContext, TexturesAreReadAsTheSamplingSays)

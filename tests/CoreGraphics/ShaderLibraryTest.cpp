@@ -157,6 +157,54 @@ TEST_P(ShaderLibrary, NoUniformIsInBothShadersOfAPair)
 	}
 }
 
+TEST_P(ShaderLibrary, ProgramsHaveTheUniformsThatTheirUsersSet)
+{
+	struct VRow
+	{
+		const char* m_pVertex;
+		const char* m_pFragment;
+		std::vector<const char*> m_Uniforms;
+	};
+	const VRow rows[] = {{"Target", "Colour", {"u_TargetPosAndSize", "u_ModelColour"}},
+	    {"NonUniformSphere", "Covariance", {"u_ModelTransform", "u_ModelColour"}},
+	    {"Simple3DModelColour", "SimpleLighting", {"u_ModelTransform", "u_ModelColour"}},
+	    {"Simple3DModelColour", "Colour", {"u_ModelTransform", "u_ModelColour"}},
+	    {"Segment", "Segment", {"u_ModelTransform", "u_SegmentColour"}},
+	    {"Sphere", "SimpleLighting", {"u_ReconPosAndSize", "u_ModelColour"}},
+	    {"MissingMarker", "MissingMarker", {"u_ReconPosAndSize", "u_ModelColour"}},
+	    {"Simple3DModelWireframe", "Colour", {"u_ModelTransform"}},
+	    {"Simple3DModelWireframe", "UniformColour", {"u_ModelTransform", "u_colour"}},
+	    {"Stick", "Colour", {"u_ModelTransform", "u_StickColourA", "u_StickColourB"}},
+	    {"FloorGrid", "FloorGrid", {"u_Extents", "u_GridSpacings", "t_Texture"}},
+	    {"FloorGrid", "FloorGridComputed",
+	        {"u_Extents", "u_GridSpacings", "u_LineWidth", "u_TilesAcross", "u_TilesUp", "u_InverseDepths"}},
+	    {"FloorGrid", "UniformColour", {"u_Extents", "u_colour"}},
+	    {"Simple", "Outlines", {"t_Selection", "u_PrimaryColour", "u_PreSelectColour"}},
+	    {"Simple", "AntiAlias", {"t_Buffer"}}, {"Simple3DPointSize", "UniformColour", {"u_PointSize", "u_colour"}},
+	    {"General2D", "UniformColour", {"u_Rotation", "u_RotationCentre", "u_colour"}},
+	    {"ForcePlate", "ForcePlate", {"u_Force", "u_CentreOfPressure"}},
+	    {"FBXSkin", "FBXMaterial",
+	        {"u_BoneTransforms", "u_DiffuseColour", "t_DiffuseTexture", "u_DiffuseTextureEnabled", "u_HighlightMissing",
+	            "u_SpecularColour", "u_EmissiveColour", "u_Shininess", "u_UserColourA", "u_UserColourB", "u_Alpha"}},
+	    {"FBXSkin", "XRay",
+	        {"u_BoneTransforms", "u_DiffuseColour", "t_DiffuseTexture", "u_DiffuseTextureEnabled",
+	            "u_HighlightMissing"}},
+	    {"FBXSkin", "Selection", {"u_BoneTransforms", "u_SelectionId"}},
+	    {"FBXMesh", "FBXMaterial",
+	        {"u_ModelTransform", "u_DiffuseColour", "t_DiffuseTexture", "u_DiffuseTextureEnabled", "u_SpecularColour",
+	            "u_EmissiveColour", "u_Shininess", "u_Alpha"}}};
+	VShaderLibrary library;
+	library.InitialiseGL();
+	for (const VRow& rRow : rows)
+	{
+		const auto pProgram = library.GetProgram(rRow.m_pVertex, rRow.m_pFragment);
+		ASSERT_TRUE(pProgram);
+		for (const char* pName : rRow.m_Uniforms)
+			EXPECT_NE(pProgram->GetUniformLocation(pName), -1)
+			    << rRow.m_pVertex << ", " << rRow.m_pFragment << ": " << pName;
+	}
+}
+
 TEST_P(ShaderLibrary, UnknownNamesGiveNothingAndStoreNothing)
 {
 	VShaderLibrary library;
@@ -271,4 +319,24 @@ TEST_P(ShaderLibrary, IsMadeAgainInAContextThatSharesNothing)
 		EXPECT_EQ(other.GL().glGetError(), static_cast<GLenum>(GL_NO_ERROR));
 	}
 	m_Context.MakeCurrent();
+}
+
+TEST_P(ShaderLibrary, HeaderNamesTheLanguage)
+{
+	VShader shader(EShaderFragment, ":/FragmentShaders/Colour.glsl");
+	ASSERT_FALSE(shader.IsEmpty());
+	const bool bES = GetParam() == EDialect::ES2;
+	const std::string source = shader.Get()->sourceCode().toStdString();
+	EXPECT_EQ(VShader::Header(bES, "shared\n"),
+	    std::string(bES ? "#version 100\n" : "#version 120\n") + "#ifdef GL_ES\nprecision mediump float;\n#endif\n"
+	        + (bES ? "#line 1 1\nshared\n#line 1 0\n" : "#line 0 1\nshared\n#line 0 0\n"));
+	EXPECT_NE(source.find(bES ? "#version 100" : "#version 120"), std::string::npos);
+}
+
+TEST(ShaderLibraryWithoutOpenGL, CanBeMade)
+{
+	VShaderLibrary library;
+	EXPECT_EQ(library.GetVertexShaderNames(), std::vector<std::string>());
+	EXPECT_FALSE(library.GetProgram("Sphere", "SimpleLighting"));
+	EXPECT_NE(library.GetResourceRoot(), "");
 }

@@ -222,3 +222,11 @@ TEST_P(Shading, XRayShowsEdges)
 	ExpectColour(QVector3D(0, 0, 1), QVector4D(1, 1, 1, 1.25f * 0.03f));
 	ExpectColour(QVector3D(0, 1, 0), QVector4D(1, 1, 1, 0.25f + 1.25f * 0.03f));
 }
+
+TEST_P(Shading, SelectionWritesTheId)
+{
+	ASSERT_TRUE(Use("Simple3DModelColour", "Selection"));
+	Set("u_ModelTransform", QMatrix4x4());
+	Set("u_SelectionId", QVector3D(1 / 255.0f, 128 / 255.0f, 255 / 255.0f));
+	ExpectColour(QVector3D(0, 0, 1), QVector4D(1 / 255.0f, 128 / 255.0f, 1.0f, 1 / 255.0f));
+}

@@ -17,12 +17,17 @@ using namespace CoreGraphics;
 namespace
 {
 
+template <typename T>
+std::vector<T> As(const std::vector<std::uint8_t>& i_rBytes)
+{
+	std::vector<T> values(i_rBytes.size() / sizeof(T));
+	std::memcpy(values.data(), i_rBytes.data(), i_rBytes.size());
+	return values;
+}
+
 std::vector<std::uint16_t> Indices(const VShape& i_rShape)
 {
-	const std::vector<std::uint8_t>& rBytes = i_rShape.m_Indices.Bytes();
-	std::vector<std::uint16_t> indices(rBytes.size() / sizeof(std::uint16_t));
-	std::memcpy(indices.data(), rBytes.data(), rBytes.size());
-	return indices;
+	return As<std::uint16_t>(i_rShape.m_Indices.Bytes());
 }
 
 /// Of an attribute of three floats.
@@ -76,19 +81,53 @@ void ExpectClosedAndOutward(const VShape& i_rShape, const QVector3D& i_rInside, 
 
 } // namespace
 
+TEST(Shapes, AxesAreThreeColouredLines)
+{
+	const VShape axes = MakeAxes(100.0f);
+	EXPECT_EQ(axes.m_Vertices.Format(), VVertexFormat::PositionColour());
+	ASSERT_EQ(axes.m_Vertices.Count(), 6u);
+	EXPECT_EQ(Indices(axes), (std::vector<std::uint16_t>{0, 1, 2, 3, 4, 5}));
+	const std::vector<QVector3D> positions = Vectors(axes, 0);
+	const std::uint8_t colours[3][4] = {{255, 0, 0, 255}, {0, 255, 0, 255}, {0, 0, 255, 255}};
+	for (std::size_t axis = 0; axis < 3; ++axis)
+	{
+		QVector3D end;
+		end[int(axis)] = 100.0f;
+		EXPECT_EQ(positions[2 * axis], QVector3D());
+		EXPECT_EQ(positions[2 * axis + 1], end);
+		for (std::size_t vertex = 2 * axis; vertex < 2 * axis + 2; ++vertex)
+			EXPECT_EQ(std::memcmp(axes.m_Vertices.Bytes().data() + 16 * vertex + 12, colours[axis], 4), 0);
+	}
+}
+
 TEST(Shapes, BoxIsTheUnitCube)
 {
-	const VShape box = MakeBox(false), wire = MakeBox(true);
-	EXPECT_EQ(box.m_Indices.Count(), 36u);
+	const VShape box = MakeBox(false);
+	EXPECT_EQ(box.m_Vertices.Count(), 24u);
+	const std::vector<std::uint16_t> indices = Indices(box);
+	ASSERT_EQ(indices.size(), 36u);
+	const std::uint16_t pattern[] = {0, 2, 1, 0, 3, 2};
+	for (std::size_t i = 0; i < indices.size(); ++i)
+		EXPECT_EQ(indices[i], 4 * (i / 6) + pattern[i % 6]);
 	ExpectClosedAndOutward(box, {}, true);
-	for (const VShape* const pBox : {&box, &wire})
-		for (const QVector3D& rPoint : Vectors(*pBox, 0))
-			for (int axis = 0; axis < 3; ++axis)
-				EXPECT_EQ(std::abs(rPoint[axis]), 0.5f);
-	const std::vector<std::uint16_t> edges = Indices(wire);
-	ASSERT_EQ(edges.size(), 24u);
-	for (std::size_t i = 0; i < edges.size(); i += 2)
-		EXPECT_EQ((Vectors(wire, 0)[edges[i]] - Vectors(wire, 0)[edges[i + 1]]).length(), 1.0f);
+	for (const QVector3D& rPoint : Vectors(box, 0))
+	{
+		for (int axis = 0; axis < 3; ++axis)
+			EXPECT_EQ(std::abs(rPoint[axis]), 0.5f);
+	}
+}
+
+TEST(Shapes, WireBoxHasTwelveEdgesOfLengthOne)
+{
+	const VShape box = MakeBox(true);
+	EXPECT_EQ(Indices(box),
+	    (std::vector<std::uint16_t>{0, 1, 1, 2, 2, 3, 3, 0, 4, 5, 5, 6, 6, 7, 7, 4, 0, 4, 1, 5, 2, 6, 3, 7}));
+	const std::vector<QVector3D> positions = Vectors(box, 0), normals = Vectors(box, 1);
+	ASSERT_EQ(positions.size(), 8u);
+	for (std::size_t i = 0; i < 24; i += 2)
+		EXPECT_EQ((positions[Indices(box)[i]] - positions[Indices(box)[i + 1]]).length(), 1.0f);
+	for (std::size_t i = 0; i < 8; ++i)
+		EXPECT_LT((normals[i] - positions[i] / std::sqrt(0.75f)).length(), 1e-6f);
 }
 
 TEST(Shapes, SphereSharesItsVertices)
@@ -104,6 +143,8 @@ TEST(Shapes, SphereSharesItsVertices)
 		if (level <= 3)
 			ExpectClosedAndOutward(sphere, {}, true);
 	}
+	EXPECT_EQ(Vectors(MakeSphere(0), 0),
+	    (std::vector<QVector3D>{{0, 1, 0}, {0, 0, -1}, {-1, 0, 0}, {0, 0, 1}, {1, 0, 0}, {0, -1, 0}}));
 }
 
 TEST(Shapes, CylinderAndConeStandOnZ)

@@ -101,6 +101,34 @@ TEST(ManipulatorDrag, PointsOfLinesAndPlanesUnderARay)
 	}
 }
 
+TEST(ManipulatorDrag, ArrowsMoveAlongTheirAxisWithTheMouse)
+{
+	// From above, 4 mm a pixel, with X to the left and Y down.
+	const VCameraController camera = MakeCamera(CoreGraphics::ECameraTop);
+	QMatrix4x4 start;
+	start.translate(100.0f, 200.0f, 300.0f);
+	struct VRow
+	{
+		std::uint32_t m_Axis;
+		QPoint m_Move;
+		QVector3D m_Expected;
+	};
+	for (const VRow& rRow : {VRow{0, {25, 7}, {-100, 0, 0}}, {0, {-25, 0}, {100, 0, 0}}, {1, {13, 30}, {0, 120, 0}}})
+	{
+		auto drag = VManipulatorDrag::Press(camera, {310, 390}, {EManipulatorArrow, rRow.m_Axis}, start);
+		ASSERT_TRUE(drag);
+		// Where the mouse went between is of no matter.
+		drag->Drag(camera, {7, 9}, {});
+		const auto moved = drag->Drag(camera, QPoint(310, 390) + rRow.m_Move, {});
+		ASSERT_TRUE(moved);
+		QMatrix4x4 expected = start;
+		expected.translate(rRow.m_Expected);
+		ExpectNear(*moved, expected, 1e-6f, 0.02f);
+	}
+	// The axis that points at the eye cannot be taken hold of.
+	EXPECT_FALSE(VManipulatorDrag::Press(camera, {310, 390}, {EManipulatorArrow, 2}, start));
+}
+
 TEST(ManipulatorDrag, WhatIsMovedStaysUnderTheMouse)
 {
 	const VCameraController camera = MakeCamera(CoreGraphics::ECameraPerspective);

@@ -50,8 +50,8 @@ INSTANTIATE_IN_BOTH_DIALECTS(Offscreen);
 
 TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
 {
-	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}, {Item(3), {100, 103, 1, 1}},
-	    {Item(4), {100, 97, 1, 1}}, {Item(5), {50, 136, 1, 1}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}, {Item(3), {100, 123, 1, 1}},
+	    {Item(4), {100, 117, 1, 1}}, {Item(5), {50, 136, 1, 1}}};
 	m_pSelection->Selection().Replace({Item(1)});
 	Frame();
 	// Samples and channels of what is drawn into.
@@ -70,9 +70,9 @@ TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
 	EXPECT_EQ(image.pixel(190, 150), 0xff202020u);
 	EXPECT_EQ(Picked({120, 40}), std::vector<std::uint32_t>{2});
 	EXPECT_EQ(Picked({80, 120}), std::vector<std::uint32_t>{});
-	EXPECT_EQ(Picked({100, 100}), std::vector<std::uint32_t>{3}) << "of equally far ones the first row from the bottom";
+	EXPECT_EQ(Picked({100, 120}), std::vector<std::uint32_t>{3}) << "of equally far ones the first row from the bottom";
 	EXPECT_EQ(Picked({50, 130}), std::vector<std::uint32_t>{}) << "six pixels are too far";
-	EXPECT_EQ(Picked({10, 10}, QPoint(150, 90)), (std::vector<std::uint32_t>{1, 2}));
+	EXPECT_EQ(Picked({10, 10}, QPoint(150, 100)), (std::vector<std::uint32_t>{1, 2}));
 }
 
 TEST_P(Offscreen, PicksRectanglesExactlyOrThroughLayers)
@@ -149,6 +149,16 @@ TEST(SphereHelper, ChoosesTheMeshByTheEdgesOnScreen)
 	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(1e6f, 1), 1);
 	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(1e6f, 9), 3);
 	EXPECT_EQ(OrlexGraphics::VSphereHelper::Level(-1.0f, 3), -1);
+}
+
+TEST_P(Offscreen, WalksOverWhatDoesNotChange)
+{
+	for (std::uint32_t i = 0; i < 40; ++i)
+		m_pScene->m_Next.m_Boxes.push_back({Item(i), QRectF(4 * i, 20, 3, 3)});
+	AddSpheres({0.5, 1.0, 3.0, 9.0}, *m_pScene);
+	m_pSelection->Selection().Replace({Item(1), Item(2)});
+	Frame();
+	ExpectThatAFrameIsAWalk();
 }
 
 TEST_P(Offscreen, GoesOnInAContextThatSharesNothing)

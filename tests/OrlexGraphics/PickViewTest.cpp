@@ -44,6 +44,39 @@ TEST_F(VViewTest, SelectsWithTheMouse)
 	}
 }
 
+TEST_F(VViewTest, PicksTheNearestWithinFivePixels)
+{
+	// One pixel each, to both sides of the mouse in (50, 50).
+	m_pScene->m_Next.m_Boxes = {
+	    {Item(1), {46, 50, 1, 1}},
+	    {Item(2), {54, 50, 1, 1}},
+	    {Item(3), {100, 53, 1, 1}},
+	    {Item(4), {100, 47, 1, 1}},
+	    {Item(5), {153, 50, 1, 1}},
+	    {Item(6), {146, 50, 1, 1}},
+	    {Item(7), {50, 106, 1, 1}},
+	};
+	Show();
+	const struct
+	{
+		const char* m_pName;
+		QPoint m_Where;
+		VIndices m_Expected;
+	} rows[] = {
+	    {"left and right are equally far", {50, 50}, {1}},
+	    // Rows count from the bottom.
+	    {"above and below are equally far", {100, 50}, {3}},
+	    {"the right one is nearer", {150, 50}, {5}},
+	    {"six pixels are too far", {50, 100}, {}},
+	};
+	for (const auto& rRow : rows)
+	{
+		Click(rRow.m_Where);
+		ASSERT_TRUE(Commit()) << rRow.m_pName;
+		EXPECT_EQ(Selected(), rRow.m_Expected) << rRow.m_pName;
+	}
+}
+
 TEST_F(VViewTest, SelectsARectangleThroughSixteenLayers)
 {
 	for (std::uint32_t i = 0; i < 18; ++i)
@@ -112,19 +145,34 @@ TEST_F(VViewTest, SwapsTheMouseByThePreference)
 	CoreGraphics::VInteractionMapper::SetActive(m_pMapper);
 	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
 	Show();
+	m_pView->SetCameraType(CoreGraphics::ECameraPerspective);
+	const auto drag = [&](Qt::KeyboardModifiers i_Modifiers)
+	{
+		const float yaw = m_pView->Camera().m_Yaw;
+		Press({10, 100}, i_Modifiers);
+		Drag({30, 100}, i_Modifiers);
+		const bool bRectangle = m_pView->MouseState() == OrlexGraphics::EMouseDragging;
+		Release({30, 100}, i_Modifiers);
+		EXPECT_TRUE(Commit());
+		EXPECT_EQ(m_pView->Camera().m_Yaw != yaw, !bRectangle);
+		return bRectangle;
+	};
 	for (const std::int32_t number : {1, 0, 1})
 	{
 		pPreferences->SetNumber(TesselPluginInterface::c_NavigationAltKey, number);
 		QCoreApplication::processEvents();
-		for (const auto& [bAlt, x, index] : {std::tuple(false, 40, 1u), {true, 120, 2u}})
+		EXPECT_EQ(drag({}), number == 0);
+		EXPECT_EQ(drag(Qt::AltModifier), number == 1);
+	}
+	// A click is a click with either of them.
+	m_pView->SetCameraType(CoreGraphics::ECameraFront);
+	for (const std::int32_t number : {0, 1})
+	{
+		pPreferences->SetNumber(TesselPluginInterface::c_NavigationAltKey, number);
+		QCoreApplication::processEvents();
+		for (const auto& [x, modifiers, index] :
+		    {std::tuple(40, Qt::KeyboardModifiers(), 1u), {120, Qt::AltModifier, 2u}})
 		{
-			const Qt::KeyboardModifiers modifiers = bAlt ? Qt::AltModifier : Qt::NoModifier;
-			Press({10, 100}, modifiers);
-			Drag({30, 100}, modifiers);
-			EXPECT_EQ(m_pView->MouseState() == OrlexGraphics::EMouseDragging, bAlt == (number == 1));
-			Release({30, 100}, modifiers);
-			ASSERT_TRUE(Commit());
-			// A click is a click with either of them.
 			Click({x, 40}, modifiers);
 			ASSERT_TRUE(Commit());
 			EXPECT_EQ(Selected(), VIndices{index});

@@ -37,6 +37,47 @@ INSTANTIATE_IN_BOTH_DIALECTS(RenderFloor);
 
 } // namespace
 
+TEST_P(RenderFloor, IsOpaqueOrSeenThroughFromEitherSide)
+{
+	struct VRow
+	{
+		std::uint32_t m_Type;
+		bool m_bTranslucent;
+		float m_Alpha;
+	};
+	const VRow rows[] = {{CoreGraphics::ECameraTop, true, 0.75f}, {CoreGraphics::ECameraBottom, true, 0.25f},
+	    {CoreGraphics::ECameraTop, false, 1.0f}, {CoreGraphics::ECameraBottom, false, 1.0f}};
+	m_Background = QColor(100, 100, 100);
+	// 5 mm a pixel: 300 pixels, from the middle.
+	m_Camera.m_OrthographicScale = 5.0f;
+	m_pFloor->SetFloor(VFloor{-750, -750, 750, 750, 500.0f, 10});
+	for (const bool bYUp : {false, true})
+	{
+		for (const VRow& rRow : rows)
+		{
+			SCOPED_TRACE(testing::Message() << rRow.m_Type << rRow.m_bTranslucent << bYUp);
+			m_Camera.m_Type = rRow.m_Type;
+			m_Camera.m_bYUp = bYUp;
+			m_Options.m_bFloorGridIsTranslucent = rRow.m_bTranslucent;
+			EXPECT_FALSE(Draw(*m_pFloor, rRow.m_bTranslucent ? EPassOpaque : EPassTransparent));
+			Draw(*m_pFloor, rRow.m_bTranslucent ? EPassTransparent : EPassOpaque);
+			ExpectNear(Drawn(), QRect(150, 50, 301, 301));
+			// Halfway between all lines a grey of 0.2, over the background.
+			const float expected = rRow.m_Alpha * 51.0f + (1.0f - rRow.m_Alpha) * 100.0f;
+			EXPECT_NEAR(static_cast<float>(Pixel(300 + 55, 200 + 45)[0]), expected, 3.0f);
+			// The strips along the axes, and the edge, are not seen through.
+			const int edge = Drawn().left();
+			for (const VColour& rColour : {Pixel(300, 325), Pixel(399, 200), Pixel(edge, 325)})
+			{
+				for (const int channel : rColour)
+					EXPECT_NEAR(channel, 128, 1);
+			}
+			// A large line at 500 mm is brighter than what lies beside it.
+			EXPECT_GT(std::max({Pixel(399, 245)[0], Pixel(400, 245)[0]}), Pixel(395, 245)[0] + 10);
+		}
+	}
+}
+
 TEST_P(RenderFloor, LinesCountAsMuchAsTheyCover)
 {
 	// Lines are 4 mm and 2 mm wide.

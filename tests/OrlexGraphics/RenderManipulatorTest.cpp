@@ -2,11 +2,16 @@
 
 #include "OrlexGraphics/RenderManipulator.h"
 
+#include <algorithm>
+#include <cstdlib>
+
 using namespace OrlexGraphics;
 
 namespace
 {
 
+constexpr std::array<int, 3> c_Green{51, 255, 51};
+constexpr std::array<int, 3> c_Blue{51, 51, 255};
 constexpr std::array<int, 3> c_Yellow{255, 255, 0};
 
 class RenderManipulator : public VRenderTypeTest
@@ -23,6 +28,17 @@ protected:
 		m_Camera.m_Type = CoreGraphics::ECameraRight;
 	}
 
+	/// Pixels from the lower left corner that hold a colour, within one step of a byte.
+	QRect ExtentOf(const VColour& i_rColour) const
+	{
+		return Extent(
+		    [&](const VColour& i_rPixel)
+		    {
+			    return std::equal(i_rPixel.begin(), i_rPixel.end(), i_rColour.begin(),
+			        [](int i_A, int i_B) { return std::abs(i_A - i_B) <= 1; });
+		    });
+	}
+
 	void PointAt(const VManipulatorHandle& i_rHandle) { m_pSelection->PreSelection().Replace({HandleItem(i_rHandle)}); }
 
 	std::unique_ptr<VRenderManipulator> m_pManipulator;
@@ -30,6 +46,67 @@ protected:
 INSTANTIATE_IN_BOTH_DIALECTS(RenderManipulator);
 
 } // namespace
+
+TEST_P(RenderManipulator, HandlesKeepTheirSizeOnTheScreen)
+{
+	struct VRow
+	{
+		const char* m_pName;
+		std::uint32_t m_Type;
+		float m_Distance;
+		float m_Scale;
+		float m_PixelRatio;
+		float m_Factor;
+	};
+	const VRow rows[] = {{"fixed", CoreGraphics::ECameraRight, 7000, 1, 1, 1},
+	    {"near", CoreGraphics::ECameraPerspective, 1000, 1, 1, 1},
+	    {"far", CoreGraphics::ECameraPerspective, 40000, 1, 1, 1},
+	    {"half", CoreGraphics::ECameraRight, 7000, 0.5f, 1, 0.5f},
+	    {"a fine display", CoreGraphics::ECameraRight, 7000, 0.5f, 2, 1}};
+	// Level with the floor, along -X as the fixed view looks.
+	m_Camera.m_Pitch = -90.0f;
+	m_Camera.m_Yaw = -90.0f;
+	m_pManipulator->SetModeMask(1);
+	for (const VRow& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		m_Camera.m_Type = rRow.m_Type;
+		m_Camera.m_Distance = rRow.m_Distance;
+		m_Options.m_ManipulatorScale = rRow.m_Scale;
+		m_Render.m_PixelRatio = rRow.m_PixelRatio;
+		DrawFrame(*m_pManipulator);
+		// A shaft from 10 to 90 and a head to 120 pixels, whose tip is thinner than a pixel; the head of X covers the
+		// beginning.
+		const QRect green = ExtentOf(c_Green), blue = ExtentOf(c_Blue);
+		EXPECT_NEAR(green.right() - m_Size.width() / 2, 120 * rRow.m_Factor, 3.5);
+		EXPECT_NEAR(green.left() - m_Size.width() / 2, 10 * rRow.m_Factor, 3.5);
+		EXPECT_NEAR(green.height(), 20 * rRow.m_Factor, 2.5);
+		EXPECT_NEAR(blue.bottom() - m_Size.height() / 2, 120 * rRow.m_Factor, 3.5);
+		EXPECT_NEAR(blue.width(), 20 * rRow.m_Factor, 2.5);
+	}
+}
+
+TEST_P(RenderManipulator, ModesChooseTheHandles)
+{
+	struct VRow
+	{
+		std::uint32_t m_Mask;
+		/// Of the handles of Z, seen from +X.
+		QRect m_Blue;
+	};
+	const VRow rows[] = {{0, {}}, {1, {QPoint(190, 160), QPoint(210, 270)}},
+	    // Sides at 25 pixels along X, which points at the eye, and along Y.
+	    {2, {QPoint(199, 149), QPoint(226, 151)}}, {4, {QPoint(149, 149), QPoint(251, 151)}}, {8, {}}};
+	for (const VRow& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_Mask);
+		m_pManipulator->SetModeMask(rRow.m_Mask);
+		DrawFrame(*m_pManipulator);
+		const QRect blue = ExtentOf(c_Blue);
+		EXPECT_EQ(blue.isEmpty(), rRow.m_Blue.isEmpty());
+		ExpectNear(blue, rRow.m_Blue, 3.0);
+	}
+}
 
 TEST_P(RenderManipulator, DrawsOnlyWhereItMay)
 {

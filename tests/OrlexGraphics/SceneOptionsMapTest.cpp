@@ -3,111 +3,176 @@
 #include <QQmlPropertyMap>
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <limits>
-#include <map>
+#include <set>
 
 namespace
 {
 
 using OrlexGraphics::VSceneOptions;
+using OrlexGraphics::VSubjectOptions;
 
-const std::pair<QVariant, QStringList> c_SceneRows[] = {
-    {true,
-        {"3D", "GlobalAxis", "FloorGrid", "FloorGridIsTranslucent", "ReconstructionVolume", "Cameras", "CameraFrustums",
-            "CameraMaskGrid", "CameraShowRotated", "CameraGreyscale", "CameraCentroids", "Reconstructions",
-            "MarkerRadius", "FillMethod", "Locators", "RigidBodies", "FBXScene", "SubjectNames", "Manipulator",
-            "HighlightCurrentSubject", "UseCentroidConnectionColourScheme", "Video"}},
-    {false,
-        {"CameraView", "Distort3D", "YUp", "CameraAxes", "CameraRays", "CameraSnap90Degrees", "CameraMaximiseGreyscale",
-            "CameraWandSmear", "CameraBorder", "ReconstructedRadius", "MarkerTrails", "AllowTrailKeySelection",
-            "Threshold", "ActiveLabelHalo", "RenderInClipColor", "SelectedReconCount"}},
-    {QString(), {"OverlayCamera", "SubjectPreset"}},
-    {0, {"ContributionsType", "DebugVideo"}},
-    {10, {"trialLengthPast", "trialLengthFuture"}},
-    {128, {"CameraMaximiseGreyscaleHistory"}},
-    {0x202020u, {"BackgroundColorRGB"}},
-    {0.0, {"CameraMaximiseGreyscaleFactor"}},
-    {1.0, {"3DOpacity"}},
-    {1.0f, {"ReconstructionScale", "ManipulatorScale"}},
-    {6.0f, {"FloorGridSize"}},
+struct VRow
+{
+	const char* m_pKey;
+	QVariant m_Default;
+	/// Another value, as QML would write it.
+	QVariant m_Other;
+	/// Sets the member that belongs to the key to the other value.
+	std::function<void(VSceneOptions&)> m_SetOther;
 };
 
-/// Of each of the classes.
-const std::pair<bool, QStringList> c_SubjectRows[] = {
-    {true, {"Enabled", "Bones", "Markers", "Sticks", "MissingMarkers", "Origins", "Clusters", "Skin"}},
-    {false, {"Axes", "Joints", "SticksDuringGaps", "Targets", "TargetCovariances", "SkinXRay"}}};
-
-/// Of every key.
-std::map<QString, QVariant> Defaults()
+VRow Bool(const char* i_pKey, bool i_bDefault, bool VSceneOptions::*i_pMember)
 {
-	std::map<QString, QVariant> defaults;
-	for (const auto& [rDefault, rKeys] : c_SceneRows)
-		for (const QString& rKey : rKeys)
-			defaults[rKey] = rDefault;
-	for (const char* const pClass : {"PropSubject-", "LabellingSubject-", "SolvingSubject-", "RetargetingSubject-"})
-		for (const auto& [bDefault, rKeys] : c_SubjectRows)
-			for (const QString& rKey : rKeys)
-				defaults[pClass + rKey] = bDefault;
-	return defaults;
+	return {i_pKey, i_bDefault, !i_bDefault, [=](VSceneOptions& o_rOptions) { o_rOptions.*i_pMember = !i_bDefault; }};
 }
 
-std::map<QString, QVariant> Written(const VSceneOptions& i_rOptions)
+template <typename T>
+VRow Value(const char* i_pKey, T i_Default, T i_Other, T VSceneOptions::*i_pMember)
 {
-	QQmlPropertyMap map;
-	OrlexGraphics::WriteOptionsToMap(i_rOptions, map);
-	std::map<QString, QVariant> values;
-	for (const QString& rKey : map.keys())
-		values[rKey] = map.value(rKey);
-	return values;
+	// A number of QML is a double.
+	return {i_pKey, QVariant::fromValue(i_Default), static_cast<double>(i_Other),
+	    [=](VSceneOptions& o_rOptions) { o_rOptions.*i_pMember = i_Other; }};
 }
 
-/// What is read where one value is another than the default.
-VSceneOptions ReadWith(const QString& i_rKey, const QVariant& i_rValue)
+VRow Text(const char* i_pKey, std::string VSceneOptions::*i_pMember)
+{
+	return {i_pKey, QString(), QString::fromUtf8("K\xc3\xa4mera"),
+	    [=](VSceneOptions& o_rOptions) { o_rOptions.*i_pMember = "K\xc3\xa4mera"; }};
+}
+
+struct VSubjectRow
+{
+	const char* m_pKey;
+	bool m_bDefault;
+	bool VSubjectOptions::*m_pMember;
+};
+
+const VSubjectRow c_SubjectRows[] = {
+    {"Enabled", true, &VSubjectOptions::m_bEnabled},
+    {"Axes", false, &VSubjectOptions::m_bAxes},
+    {"Bones", true, &VSubjectOptions::m_bBones},
+    {"Markers", true, &VSubjectOptions::m_bMarkers},
+    {"Sticks", true, &VSubjectOptions::m_bSticks},
+    {"Joints", false, &VSubjectOptions::m_bJoints},
+    {"MissingMarkers", true, &VSubjectOptions::m_bMissingMarkers},
+    {"Origins", true, &VSubjectOptions::m_bOrigins},
+    {"SticksDuringGaps", false, &VSubjectOptions::m_bSticksDuringGaps},
+    {"Targets", false, &VSubjectOptions::m_bTargets},
+    {"TargetCovariances", false, &VSubjectOptions::m_bTargetCovariances},
+    {"Clusters", true, &VSubjectOptions::m_bClusters},
+    {"Skin", true, &VSubjectOptions::m_bSkin},
+    {"SkinXRay", false, &VSubjectOptions::m_bSkinXRay},
+};
+
+std::vector<std::pair<QString, VRow>> Rows()
+{
+	using O = VSceneOptions;
+	const VRow rows[] = {
+	    Bool("CameraView", false, &O::m_bCameraView),
+	    Bool("3D", true, &O::m_b3D),
+	    Bool("Distort3D", false, &O::m_bDistort3D),
+	    Bool("YUp", false, &O::m_bYUp),
+	    Value("3DOpacity", 1.0, 0.25, &O::m_3DOpacity),
+	    Text("OverlayCamera", &O::m_OverlayCamera),
+	    Bool("GlobalAxis", true, &O::m_bGlobalAxis),
+	    Bool("FloorGrid", true, &O::m_bFloorGrid),
+	    Bool("FloorGridIsTranslucent", true, &O::m_bFloorGridIsTranslucent),
+	    Bool("ReconstructionVolume", true, &O::m_bReconstructionVolume),
+	    Value("FloorGridSize", 6.0f, 12.5f, &O::m_FloorGridSize),
+	    Bool("Cameras", true, &O::m_bCameras),
+	    Bool("CameraAxes", false, &O::m_bCameraAxes),
+	    Bool("CameraFrustums", true, &O::m_bCameraFrustums),
+	    Bool("CameraRays", false, &O::m_bCameraRays),
+	    Bool("CameraMaskGrid", true, &O::m_bCameraMaskGrid),
+	    Bool("CameraShowRotated", true, &O::m_bCameraShowRotated),
+	    Bool("CameraSnap90Degrees", false, &O::m_bCameraSnap90Degrees),
+	    Bool("CameraGreyscale", true, &O::m_bCameraGreyscale),
+	    Bool("CameraMaximiseGreyscale", false, &O::m_bCameraMaximiseGreyscale),
+	    Value("CameraMaximiseGreyscaleFactor", 0.0, 2.5, &O::m_CameraMaximiseGreyscaleFactor),
+	    Value("CameraMaximiseGreyscaleHistory", 128, 7, &O::m_CameraMaximiseGreyscaleHistory),
+	    Bool("CameraCentroids", true, &O::m_bCameraCentroids),
+	    Bool("CameraWandSmear", false, &O::m_bCameraWandSmear),
+	    Bool("CameraBorder", false, &O::m_bCameraBorder),
+	    Bool("Reconstructions", true, &O::m_bReconstructions),
+	    Bool("ReconstructedRadius", false, &O::m_bReconstructedRadius),
+	    Value("ReconstructionScale", 1.0f, 0.5f, &O::m_ReconstructionScale),
+	    Value("ContributionsType", 0, 2, &O::m_ContributionsType),
+	    Bool("MarkerRadius", true, &O::m_bMarkerRadius),
+	    Bool("FillMethod", true, &O::m_bFillMethod),
+	    Bool("MarkerTrails", false, &O::m_bMarkerTrails),
+	    Bool("AllowTrailKeySelection", false, &O::m_bAllowTrailKeySelection),
+	    Value("trialLengthPast", 10, 20, &O::m_TrailLengthPast),
+	    Value("trialLengthFuture", 10, 30, &O::m_TrailLengthFuture),
+	    Bool("Locators", true, &O::m_bLocators),
+	    Bool("RigidBodies", true, &O::m_bRigidBodies),
+	    Bool("FBXScene", true, &O::m_bFBXScene),
+	    Bool("Threshold", false, &O::m_bThreshold),
+	    Bool("ActiveLabelHalo", false, &O::m_bActiveLabelHalo),
+	    Bool("SubjectNames", true, &O::m_bSubjectNames),
+	    Bool("Manipulator", true, &O::m_bManipulator),
+	    Text("SubjectPreset", &O::m_SubjectPreset),
+	    Value("BackgroundColorRGB", 0x202020u, 0xff102030u, &O::m_BackgroundColorRGB),
+	    Bool("RenderInClipColor", false, &O::m_bRenderInClipColor),
+	    Bool("HighlightCurrentSubject", true, &O::m_bHighlightCurrentSubject),
+	    Bool("UseCentroidConnectionColourScheme", true, &O::m_bUseCentroidConnectionColourScheme),
+	    Value("DebugVideo", 0, 3, &O::m_DebugVideo),
+	    Bool("Video", true, &O::m_bVideo),
+	    Bool("SelectedReconCount", false, &O::m_bSelectedReconCount),
+	    Value("ManipulatorScale", 1.0f, 1.5f, &O::m_ManipulatorScale),
+	};
+	std::vector<std::pair<QString, VRow>> all;
+	for (const VRow& rRow : rows)
+		all.emplace_back(rRow.m_pKey, rRow);
+	const std::pair<const char*, VSubjectOptions VSceneOptions::*> classes[] = {{"PropSubject", &O::m_PropSubject},
+	    {"LabellingSubject", &O::m_LabellingSubject}, {"SolvingSubject", &O::m_SolvingSubject},
+	    {"RetargetingSubject", &O::m_RetargetingSubject}};
+	for (const auto& [pClass, pMember] : classes)
+		for (const VSubjectRow& rRow : c_SubjectRows)
+			all.emplace_back(QString("%1-%2").arg(pClass, rRow.m_pKey),
+			    VRow{rRow.m_pKey, rRow.m_bDefault, !rRow.m_bDefault,
+			        [pMember = pMember, rRow](VSceneOptions& o_rOptions)
+			        { o_rOptions.*pMember.*rRow.m_pMember = !rRow.m_bDefault; }});
+	return all;
+}
+
+TEST(SceneOptionsMap, HasEveryOptionWithItsDefaultInItsType)
 {
 	QQmlPropertyMap map;
 	OrlexGraphics::WriteOptionsToMap(VSceneOptions(), map);
-	map.insert(i_rKey, i_rValue);
-	VSceneOptions read;
-	EXPECT_TRUE(OrlexGraphics::ReadOptionsFromMap(map, read)) << i_rKey.toStdString();
-	return read;
-}
-
-TEST(SceneOptionsMap, CarriesEachOptionAloneInItsTypeInBothDirections)
-{
-	const std::map<QString, QVariant> defaults = Defaults();
-	EXPECT_EQ(defaults.size(), 51u + 4u * 14u);
-	EXPECT_EQ(Written(VSceneOptions()), defaults);
-	for (const auto& [rKey, rDefault] : defaults)
+	std::set<QString> keys;
+	for (const auto& [rKey, rRow] : Rows())
 	{
-		// As QML writes it: a number is a double.
-		const QVariant other = rDefault.type() == QVariant::Bool ? QVariant(!rDefault.toBool())
-		    : rDefault.type() == QVariant::String                ? QVariant(QString::fromUtf8("K\xc3\xa4mera"))
-		    : rDefault.type() == QVariant::UInt                  ? QVariant(double(0xff102030))
-		                                                         : QVariant(rDefault.toDouble() + 3.0);
-		std::map<QString, QVariant> expected = defaults;
-		expected[rKey] = other;
-		EXPECT_TRUE(expected[rKey].convert(rDefault.userType()));
-		std::map<QString, QVariant> written = Written(ReadWith(rKey, other));
-		EXPECT_EQ(written, expected) << rKey.toStdString();
-		for (const auto& [rWritten, rValue] : written)
-			EXPECT_EQ(rValue.userType(), defaults.at(rWritten).userType()) << rWritten.toStdString();
+		keys.insert(rKey);
+		EXPECT_EQ(map.value(rKey), rRow.m_Default) << rKey.toStdString();
+		EXPECT_EQ(map.value(rKey).userType(), rRow.m_Default.userType()) << rKey.toStdString();
 	}
+	const QStringList written = map.keys();
+	EXPECT_EQ(std::set<QString>(written.begin(), written.end()), keys);
+	EXPECT_EQ(keys.size(), 51u + 4u * 14u);
 }
 
-// Those of subjects show in their pictures.
-TEST(SceneOptionsMap, ReadsWhatIsDrawnByUnderItsKey)
+TEST(SceneOptionsMap, CarriesEachOptionAloneInBothDirections)
 {
-	const std::pair<const char*, bool VSceneOptions::*> rows[] = {{"3D", &VSceneOptions::m_b3D},
-	    {"CameraView", &VSceneOptions::m_bCameraView}, {"Distort3D", &VSceneOptions::m_bDistort3D},
-	    {"FBXScene", &VSceneOptions::m_bFBXScene}, {"FloorGrid", &VSceneOptions::m_bFloorGrid},
-	    {"FloorGridIsTranslucent", &VSceneOptions::m_bFloorGridIsTranslucent},
-	    {"GlobalAxis", &VSceneOptions::m_bGlobalAxis}, {"Manipulator", &VSceneOptions::m_bManipulator},
-	    {"Reconstructions", &VSceneOptions::m_bReconstructions},
-	    {"ReconstructionVolume", &VSceneOptions::m_bReconstructionVolume}, {"YUp", &VSceneOptions::m_bYUp}};
-	for (const auto& [pKey, pMember] : rows)
-		EXPECT_NE(ReadWith(pKey, !(VSceneOptions().*pMember)).*pMember, VSceneOptions().*pMember) << pKey;
-	EXPECT_EQ(ReadWith("OverlayCamera", "urn:7").m_OverlayCamera, "urn:7");
-	EXPECT_EQ(ReadWith("ReconstructionScale", 2.5).m_ReconstructionScale, 2.5f);
+	for (const auto& [rKey, rRow] : Rows())
+	{
+		SCOPED_TRACE(rKey.toStdString());
+		VSceneOptions expected;
+		rRow.m_SetOther(expected);
+
+		QQmlPropertyMap map;
+		OrlexGraphics::WriteOptionsToMap(VSceneOptions(), map);
+		map.insert(rKey, rRow.m_Other);
+		VSceneOptions read;
+		EXPECT_TRUE(OrlexGraphics::ReadOptionsFromMap(map, read));
+		EXPECT_TRUE(read == expected);
+
+		QQmlPropertyMap written;
+		OrlexGraphics::WriteOptionsToMap(expected, written);
+		EXPECT_EQ(written.value(rKey), rRow.m_Other);
+		EXPECT_EQ(written.value(rKey).userType(), rRow.m_Default.userType());
+	}
 }
 
 TEST(SceneOptionsMap, KeepsWhatCannotBeRead)

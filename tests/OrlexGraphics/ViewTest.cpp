@@ -100,6 +100,16 @@ TEST_F(VViewTest, ADoubleClickPreviewsTheSelectedCamera)
 	EXPECT_EQ(m_pView->GetPreviewCamera(), "");
 }
 
+TEST_F(VViewTest, DrawsTheBackgroundColour)
+{
+	Show(std::make_shared<OrlexGraphics::VOrlexScene>(m_pShaders, m_pSelection, nullptr, m_pDispatcher, false));
+	EXPECT_TRUE(Until([&] { return Pixel(100, 80) == c_Background; }));
+
+	// As QML writes it.
+	SetOption("BackgroundColorRGB", 0x4080c0);
+	EXPECT_TRUE(Until([&] { return Pixel(100, 80) == 0xff4080c0; }));
+}
+
 TEST_F(VViewTest, DrawsPassesInTheirOrder)
 {
 	const QVector4D red(1, 0, 0, 1), green(0, 1, 0, 1), blue(0, 0, 1, 1);
@@ -119,34 +129,54 @@ TEST_F(VViewTest, DrawsPassesInTheirOrder)
 	SetOption("3D", false);
 	ASSERT_TRUE(Until([&] { return Pixel(25, 25) == c_Background; }));
 	EXPECT_EQ(Pixel(25, 35), 0xff0000ff);
-	SetOption("BackgroundColorRGB", 0x4080c0);
-	EXPECT_TRUE(Until([&] { return Pixel(25, 25) == 0xff4080c0; }));
 }
 
 TEST_F(VViewTest, OutlinesWhatIsSelectedAndWhatTheMousePointsAt)
 {
-	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {
+	    {Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}, {Item(3), {20, 100, 40, 40}}};
 	Show();
 	ASSERT_TRUE(Until([&] { return Pixel(40, 40) == 0xff0000ff; }));
 	const QImage plain = Grab();
 
-	// Filled with a quarter of grey.
+	// Fill of a quarter of grey, and an edge of three quarters of white.
 	m_pSelection->Selection().Replace({Item(1)});
 	ASSERT_TRUE(Until([&] { return Pixel(40, 40) == 0xff4040ff; }));
 	EXPECT_EQ(Pixel(120, 40), 0xff0000ff) << "the other one is not selected";
+	EXPECT_GE(qRed(Pixel(40, 20)), 200) << "edge";
+	EXPECT_EQ(Pixel(10, 10), c_Background);
+	EXPECT_EQ(Pixel(80, 40), c_Background);
+
+	// The first of two is the primary one: hatched.
+	m_pSelection->Selection().Add({Item(2)});
+	ASSERT_TRUE(Until([&] { return Pixel(120, 40) == 0xff4040ff; }));
+	int hatched = 0;
+	for (int x = 30; x < 50; ++x)
+		hatched += qRed(Pixel(x, 40)) > 180 ? 1 : 0;
+	EXPECT_GT(hatched, 6);
+	EXPECT_LT(hatched, 14);
+
 	m_pSelection->Selection().Replace({});
 	ASSERT_TRUE(Until([&] { return Grab() == plain; })) << "nothing stays";
 
-	const Qt::KeyboardModifiers subtract = Qt::ControlModifier | Qt::ShiftModifier;
-	for (const auto& [modifiers, fill] : {std::pair(Qt::KeyboardModifiers(), 0xff4020ff),
-	         {Qt::ShiftModifier, 0xff00ffff}, {subtract, 0xffff00ff}, {Qt::ControlModifier, 0xff00ffff}})
+	const struct
 	{
-		// So that each of the states means something.
-		m_pSelection->Selection().Replace(
-		    modifiers == subtract ? std::vector{Item(2)} : std::vector<NVX::ISelectionItem>());
-		Mouse(QEvent::MouseMove, {120, 40}, Qt::NoButton, Qt::NoButton, modifiers);
-		EXPECT_TRUE(Until([&] { return Pixel(120, 40) == fill; }))
-		    << std::hex << Pixel(120, 40) << " instead of " << fill;
+		Qt::KeyboardModifiers m_Modifiers;
+		QRgb m_Fill;
+	} rows[] = {
+	    {{}, 0xff4020ff},
+	    {Qt::ShiftModifier, 0xff00ffff},
+	    {Qt::ControlModifier | Qt::ShiftModifier, 0xffff00ff},
+	    {Qt::ControlModifier, 0xff00ffff},
+	};
+	// Of what is selected, so that each of the states means something.
+	for (const auto& rRow : rows)
+	{
+		const bool bSubtract = rRow.m_Modifiers == (Qt::ControlModifier | Qt::ShiftModifier);
+		m_pSelection->Selection().Replace(bSubtract ? std::vector{Item(3)} : std::vector<NVX::ISelectionItem>());
+		Mouse(QEvent::MouseMove, {40, 120}, Qt::NoButton, Qt::NoButton, rRow.m_Modifiers);
+		EXPECT_TRUE(Until([&] { return Pixel(40, 120) == rRow.m_Fill; }))
+		    << std::hex << Pixel(40, 120) << " instead of " << rRow.m_Fill;
 		Hover({190, 150});
 		EXPECT_TRUE(Until([&] { return Preselected().empty(); }));
 	}
@@ -233,18 +263,33 @@ TEST_F(VViewTest, FramesTheSelection)
 	EXPECT_EQ(rCamera.m_View, view);
 }
 
-TEST_F(VViewTest, ComesBackFromTheFrameOfTheSelection)
+TEST_F(VViewTest, TracksTheSelection)
 {
-	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}};
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20, 20, 40, 40}}, {Item(2), {100, 20, 40, 40}}};
 	m_pSelection->Selection().Replace({Item(1)});
 	Show();
 	CoreGraphics::VCameraController& rCamera = m_pView->Camera();
+	const auto centreX = [&] { return rCamera.Orientation().map(rCamera.m_Centre).x(); };
+	const float scale = rCamera.m_OrthographicScale;
+	QSignalSpy changed(m_pView, &OrlexGraphics::VSceneFramebufferObject::TrackSelectionChanged);
+
+	m_pView->SetTracking(OrlexGraphics::ETrackingSelectionThen);
+	ASSERT_TRUE(Until([&] { return std::abs(centreX() + 240.0f) < 0.1f; }));
+	m_pSelection->Selection().Replace({Item(2)});
+	m_pView->SetTracking(OrlexGraphics::ETrackingSelection);
+	ASSERT_TRUE(Until([&] { return std::abs(centreX() - 80.0f) < 0.1f; }));
+	m_pSelection->Selection().Replace({Item(1)});
+	ASSERT_TRUE(Until([&] { return std::abs(centreX() + 240.0f) < 0.1f; }));
+	EXPECT_EQ(rCamera.m_OrthographicScale, scale) << "the distance stays the operator's";
+
 	m_pView->SetTracking(OrlexGraphics::ETrackingTransform);
 	ASSERT_TRUE(Until([&] { return !rCamera.m_FrameOfReference.isIdentity(); }));
+	EXPECT_TRUE(rCamera.m_Centre.isNull());
 	EXPECT_EQ(rCamera.m_Distance, 1000.0f);
 	m_pView->SetTracking(OrlexGraphics::ETrackingNone);
 	ASSERT_TRUE(Until([&] { return rCamera.m_FrameOfReference.isIdentity(); }));
 	EXPECT_EQ(rCamera.m_Distance, 7000.0f);
+	EXPECT_EQ(changed.count(), 4);
 }
 
 TEST_F(VViewTest, PlacesLabelsOverTheView)
