@@ -119,6 +119,45 @@ TEST_P(RenderFloor, LinesCountAsMuchAsTheyCover)
 	}
 }
 
+TEST_P(RenderFloor, LinesTurnWithTheCamera)
+{
+	// Seen at a slant, a camera that is rolled by a quarter has the same pixels, a quarter further.
+	constexpr int c_Square = 400;
+	m_pFloor->SetFloor(VFloor{-100000, -100000, 100000, 100000, 1024.0f, 2});
+	m_Options.m_bFloorGridIsTranslucent = false;
+	QMatrix4x4 view;
+	view.lookAt({300.0f, -1700.0f, 1500.0f}, {1400.0f, 900.0f, 0.0f}, {0.0f, 0.0f, 1.0f});
+	std::vector<VColour> level, rolled;
+	for (std::vector<VColour>* const pPicture : {&level, &rolled})
+	{
+		m_Render.SetViewport(QRect(0, 0, c_Square, c_Square));
+		m_Render.SetYUp(false);
+		m_Render.m_Projection.setToIdentity();
+		m_Render.m_Projection.perspective(45.0f, 1.0f, 1.0f, 100000.0f);
+		m_Render.m_View.setToIdentity();
+		m_Render.m_View.rotate(pPicture == &rolled ? 90.0f : 0.0f, 0.0f, 0.0f, 1.0f);
+		m_Render.m_View *= view;
+		m_Render.ClearBuffers(true, true);
+		m_pFloor->Render(m_Render, m_Options, EPassOpaque);
+		Read();
+		for (int y = 0; y < c_Square; ++y)
+		{
+			for (int x = 0; x < c_Square; ++x)
+				pPicture->push_back(pPicture == &level ? Pixel(x, y) : Pixel(c_Square - 1 - y, x));
+		}
+	}
+	m_Render.SetViewport(QRect(QPoint(), m_Size));
+	int bright = 0, others = 0;
+	for (std::size_t i = 0; i < level.size(); ++i)
+	{
+		bright += level[i][0] > 60;
+		others += std::abs(level[i][0] - rolled[i][0]) > 3;
+	}
+	EXPECT_GT(bright, 1000);
+	// The edges of the strips along the axes may fall to either side.
+	EXPECT_LT(others, 100);
+}
+
 TEST_P(RenderFloor, IsDrawnWithItsOptionForTheEyeAlone)
 {
 	EXPECT_EQ(DrawnIn(*m_pFloor), "transparent");

@@ -1,4 +1,5 @@
 // The floor with its lines: large ones, and smaller ones of half their brightness.
+
 // Tiled, it is a grid of lines.
 uniform sampler2D t_Texture;
 
