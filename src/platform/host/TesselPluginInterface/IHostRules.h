@@ -1,0 +1,45 @@
+#pragma once
+
+#include "TesselPluginInterface/IApplicationObject.h"
+
+#include <memory>
+#include <string>
+
+namespace TesselPluginInterface
+{
+
+/// How a host wants things done where a rule has a plain form and one that fits more characters. The defaults are the
+/// plain forms.
+struct VHostRules
+{
+	/// A target subject that is newly made stands as its bones do in the FBX file, not as its joints alone place it.
+	bool m_bPoseFromFile = false;
+	/// With joint symmetry a pose whose two sides' frames are no mirror images of each other mirrors its change, not
+	/// itself.
+	bool m_bMirrorChange = false;
+};
+
+/// What a host may give beyond the services that every host gives: the application object of such a host implements
+/// this, too. Without it nothing is asked and every rule has its plain form.
+class IHostRules
+{
+public:
+	virtual ~IHostRules() = default;
+
+	/// Asked each time that it matters, so that a preference may change it.
+	virtual VHostRules Rules() const = 0;
+
+	/// Called before a command replaces a target subject that has changes which are not saved. May show a dialog, run an
+	/// event loop and save.
+	/// @param i_rAction what the operator wants to do, as the beginning of a sentence: "Create Target Subject".
+	/// @return false: the command ends with no change.
+	virtual bool MayReplaceTargetSubject(const std::string& i_rAction) = 0;
+};
+
+/// Null for a host that gives none.
+inline std::shared_ptr<IHostRules> HostRulesOf(const std::shared_ptr<IApplicationObject>& i_rpApplication)
+{
+	return std::dynamic_pointer_cast<IHostRules>(i_rpApplication);
+}
+
+} // namespace TesselPluginInterface
