@@ -1,6 +1,7 @@
 #include "ReferenceFK.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "ComputeSubjectFK/JointFKInterfaces.h"
 #include "ComputeSubjectFK/TargetFKInterfaces.h"
 
 #include <gtest/gtest.h>
