@@ -42,11 +42,13 @@ std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_r
 } // namespace
 
 VSession::VSession()
-    : m_pDispatcher(std::make_shared<InMemoryHost::VDispatcher>()),
+    : m_pApplication(std::make_shared<InMemoryHost::VApplication>()),
+      m_pDispatcher(std::make_shared<InMemoryHost::VDispatcher>()),
       m_pDocument(std::make_shared<VRetargetSetup>(m_pDispatcher,
           NVX::CountedPointer<TesselPluginInterface::IFrameFactory>(new InMemoryHost::VFrameFactory),
           NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)))
 {
+	m_pDocument->SetHostRules(m_pApplication);
 }
 
 void VSession::LoadSource(const std::string& i_rPath)

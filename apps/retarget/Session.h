@@ -3,6 +3,7 @@
 #include "retarget/Elements.h"
 
 #include "FBXIO/SkinSkeleton.h"
+#include "InMemoryHost/Application.h"
 #include "InMemoryHost/Dispatcher.h"
 #include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
@@ -43,6 +44,8 @@ public:
 	/// EBadOutput if the file could not be written; the one that stood there then stays. "-" is standard output.
 	void Save(const std::string& i_rPath);
 
+	/// What the document asks its host for.
+	TesselPluginInterface::VHostRules& Rules() { return m_pApplication->m_Rules; }
 	VRetargetSetup& Document() { return *m_pDocument; }
 	const std::shared_ptr<VRetargetSetup>& SharedDocument() const { return m_pDocument; }
 	const std::shared_ptr<InMemoryHost::VDispatcher>& Dispatcher() const { return m_pDispatcher; }
@@ -63,6 +66,7 @@ public:
 	bool m_bMatched = false;
 
 private:
+	std::shared_ptr<InMemoryHost::VApplication> m_pApplication;
 	std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher;
 	std::shared_ptr<VRetargetSetup> m_pDocument;
 	std::optional<VCharacterFile> m_File;

@@ -3,9 +3,9 @@
 #include "InMemoryHost/Flow.h"
 #include "InMemoryHost/ParameterRegistry.h"
 #include "InMemoryHost/Selection.h"
-#include "TesselPluginInterface/IApplicationObject.h"
 #include "TesselPluginInterface/IPluginContext.h"
 #include "TesselPluginInterface/IPluginGui.h"
+#include "studio/ApplicationObject.h"
 #include "studio/PanelManager.h"
 #include "studio/Preferences.h"
 #include "studio/QtDispatcher.h"
@@ -39,13 +39,14 @@ public:
 	bool GetSceneFlag() override { return false; }
 
 	VPreferences& Preferences() { return *m_pPreferences; }
+	VApplicationObject& Application() { return *m_pApplication; }
 
 private:
 	const std::shared_ptr<VQtDispatcher> m_pDispatcher;
-	const std::shared_ptr<TesselPluginInterface::IApplicationObject> m_pApplication;
 	const std::shared_ptr<TesselPluginInterface::IDataStore> m_pStore;
 	const VStoreFile m_StoreFile;
 	const std::shared_ptr<VPreferences> m_pPreferences;
+	const std::shared_ptr<VApplicationObject> m_pApplication;
 	const std::shared_ptr<TesselPluginInterface::IParameterRegistry> m_pRegistry;
 	const std::shared_ptr<TesselPluginInterface::ISelectionManager> m_pSelection;
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;

@@ -6,6 +6,7 @@
 #include <QMetaMethod>
 #include <QMetaProperty>
 
+#include <functional>
 #include <limits>
 #include <numbers>
 
@@ -332,6 +333,72 @@ TEST_F(Document, AManyStepDragKeepsOneFrameAlive)
 	EXPECT_EQ(m_Document.TargetValues().m_pParametrised.use_count(), 4)
 	    << "one item, the two models, and the value in hand";
 	EXPECT_EQ(Target().m_Segments[1].m_Joint.m_BindPose[0], 1.99);
+}
+
+/// A host that is asked before work is lost.
+struct VAskedHost : TesselPluginInterface::IHostRules
+{
+	TesselPluginInterface::VHostRules Rules() const override { return {}; }
+	bool MayReplaceTargetSubject(const std::string& i_rAction) override
+	{
+		m_Asked += i_rAction + ";";
+		m_Meanwhile();
+		return m_bAnswer;
+	}
+
+	std::string m_Asked;
+	bool m_bAnswer = false;
+	std::function<void()> m_Meanwhile = [] {};
+};
+
+TEST_F(Document, AsksItsHostBeforeUnsavedChangesAreReplaced)
+{
+	const auto pHost = std::make_shared<VAskedHost>();
+	m_Document.SetHostRules(pHost);
+	const QUrl file = QUrl::fromLocalFile(QString::fromStdString((m_Folder / "a.qrr").string()));
+	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
+	SetSmallSubjects();
+	m_Document.SaveTargetSubjectURL(file);
+
+	const auto edit = [this] { m_Document.AddTarget(0, 0, true, false); };
+	const auto create = [this] { m_Document.CreateTargetSubject(); };
+	const auto load = [&] { m_Document.LoadTargetSubjectURL(file); };
+	const auto nothing = [] {};
+	const struct
+	{
+		const char* m_pName;
+		std::function<void()> m_Before;
+		std::function<void()> m_Command;
+		bool m_bAnswer;
+		const char* m_pAsked;
+		bool m_bReplaced;
+	} rows[] = {{"loading what was saved", nothing, load, false, "", true},
+	    {"an edit, kept", edit, load, false, "Load;", false},
+	    {"still there, kept", nothing, create, false, "Create Target Subject;", false},
+	    {"still there, given up", nothing, create, true, "Create Target Subject;", true},
+	    {"just made", nothing, create, false, "", true}, {"just made, loading", nothing, load, false, "", true},
+	    {"an edit of a loaded one, given up", edit, load, true, "Load;", true},
+	    {"an edit, kept again", edit, create, false, "Create Target Subject;", false},
+	    {"saved", [&] { m_Document.SaveTargetSubjectURL(file); }, create, false, "", true},
+	    {"an edit of a new one", edit, load, false, "Load;", false},
+	    {"another file read during the question",
+	        [&]
+	        {
+		        pHost->m_Meanwhile = [this]
+		        { EXPECT_FALSE(m_Document.LoadTargetFBX(RETARGET_TEST_DATA "/fbx/cases/no_skeleton.fbx")); };
+	        },
+	        create, true, "Create Target Subject;", true}};
+	for (const auto& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		rRow.m_Before();
+		pHost->m_bAnswer = rRow.m_bAnswer;
+		pHost->m_Asked.clear();
+		const auto pBefore = m_Document.TargetValues().m_pParametrised;
+		rRow.m_Command();
+		EXPECT_EQ(pHost->m_Asked, rRow.m_pAsked);
+		EXPECT_EQ(m_Document.TargetValues().m_pParametrised != pBefore, rRow.m_bReplaced);
+	}
 }
 
 } // namespace

@@ -16,7 +16,10 @@ class VPluginContext : public TesselPluginInterface::IPluginContext
 public:
 	VPluginContext();
 
-	std::shared_ptr<TesselPluginInterface::IApplicationObject> GetApplicationObject() override { return {}; }
+	std::shared_ptr<TesselPluginInterface::IApplicationObject> GetApplicationObject() override
+	{
+		return m_pApplication;
+	}
 	std::shared_ptr<TesselPluginInterface::IPreferenceFolders> GetPreferenceFolders() override { return m_pFolders; }
 	std::shared_ptr<TesselPluginInterface::IDataStore> GetDataStore() override { return {}; }
 	std::shared_ptr<TesselPluginInterface::IParameterRegistry> GetParameterRegistry() override { return {}; }
@@ -29,6 +32,12 @@ public:
 	}
 	bool GetSceneFlag() override { return false; }
 
+	/// What is handed out from now on; null at first.
+	void SetApplicationObject(std::shared_ptr<TesselPluginInterface::IApplicationObject> i_pApplication)
+	{
+		m_pApplication = std::move(i_pApplication);
+	}
+
 	/// The same objects, as what they are.
 	VDispatcher& Dispatcher() { return *m_pDispatcher; }
 	VItemFactory& ItemFactory() { return *m_pItemFactory; }
@@ -36,6 +45,7 @@ public:
 	VSelectionManager& SelectionManager() { return *m_pSelectionManager; }
 
 private:
+	std::shared_ptr<TesselPluginInterface::IApplicationObject> m_pApplication;
 	const std::shared_ptr<VDispatcher> m_pDispatcher;
 	const std::shared_ptr<VPreferenceFolders> m_pFolders;
 	const std::shared_ptr<VSelectionManager> m_pSelectionManager;

@@ -46,6 +46,26 @@ VRetargetSetup::VRetargetSetup(std::shared_ptr<TesselPluginInterface::IDispatche
 
 VRetargetSetup::~VRetargetSetup() = default;
 
+void VRetargetSetup::SetHostRules(std::shared_ptr<TesselPluginInterface::IHostRules> i_pRules)
+{
+	m_pHostRules = std::move(i_pRules);
+}
+
+TesselPluginInterface::VHostRules VRetargetSetup::HostRules() const
+{
+	return m_pHostRules ? m_pHostRules->Rules() : TesselPluginInterface::VHostRules();
+}
+
+bool VRetargetSetup::MayReplaceTarget(const char* i_pCommand, const char* i_pAction)
+{
+	// What a press of the button made, another press makes again.
+	const bool bLoses = HasUnsavedChanges() && TargetDiffersFrom(m_MadeTarget);
+	if (!bLoses || !m_pHostRules || m_pHostRules->MayReplaceTargetSubject(i_pAction))
+		return true;
+	Ignore(i_pCommand, RetargetSetup::Ignored::c_TargetKept);
+	return false;
+}
+
 void VRetargetSetup::SetJointSymmetry(bool i_bJointSymmetry)
 {
 	if (i_bJointSymmetry == m_bJointSymmetry)

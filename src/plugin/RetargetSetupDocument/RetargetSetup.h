@@ -10,6 +10,7 @@
 #include "RetargetSetupDocument/RetargetSetupTargetModel.h"
 #include "TesselPluginInterface/IDispatcher.h"
 #include "TesselPluginInterface/IFlowFrame.h"
+#include "TesselPluginInterface/IHostRules.h"
 #include "TesselPluginInterface/IItemFactory.h"
 
 #include <QMatrix4x4>
@@ -52,6 +53,9 @@ public:
 	    NVX::CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory,
 	    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory);
 	~VRetargetSetup() override;
+
+	/// What the host gives beyond its services; null asks nothing and has the plain form of every rule.
+	void SetHostRules(std::shared_ptr<TesselPluginInterface::IHostRules> i_pRules);
 
 	/// Makes the target subject anew from the FBX skeleton, from the root bone on and with the target scale. Targets,
 	/// joint edits and bind poses of the one before are lost.
@@ -180,6 +184,16 @@ private:
 		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pParametrised;
 	};
 
+	/// As the host has them now.
+	TesselPluginInterface::VHostRules HostRules() const;
+
+	/// Asks the host before changes that are not saved are lost. False, and the command is ignored, if they stay.
+	/// @param i_pAction the command in the operator's words.
+	bool MayReplaceTarget(const char* i_pCommand, const char* i_pAction);
+
+	/// False without a target subject.
+	bool TargetDiffersFrom(const VSubjectValues& i_rKept) const;
+
 	/// Emits commandIgnored.
 	void Ignore(const char* i_pCommand, const QString& i_rReason);
 
@@ -206,6 +220,7 @@ private:
 	const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
 	const NVX::CountedPointer<TesselPluginInterface::IFrameFactory> m_pFrameFactory;
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
+	std::shared_ptr<TesselPluginInterface::IHostRules> m_pHostRules;
 	const std::shared_ptr<VRetargetSetupSegmentModel> m_pSourceSegmentModel;
 	const std::shared_ptr<VRetargetSetupSegmentModel> m_pTargetSegmentModel;
 	const std::shared_ptr<VRetargetSetupTargetModel> m_pTargetModel;
@@ -227,6 +242,8 @@ private:
 
 	/// What the file held when it was last loaded or saved.
 	VSubjectValues m_SavedTarget;
+	/// As CreateTargetSubject left it.
+	VSubjectValues m_MadeTarget;
 
 	std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pSourceFK;
 	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubjectOfSourceFK;

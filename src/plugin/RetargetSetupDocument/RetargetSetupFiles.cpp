@@ -80,6 +80,13 @@ void TellSourceOfSaved(const std::string& i_rNamed, const std::string& i_rShown)
 		    "The saved subject names source skeleton '%1%', and the one that is shown is '%2%'", i_rNamed, i_rShown);
 }
 
+/// Both are kept as they were handed out, so that most are the same objects.
+template <typename T>
+bool Differ(const std::shared_ptr<const T>& i_rpA, const std::shared_ptr<const T>& i_rpB)
+{
+	return i_rpA != i_rpB && (!i_rpA || !i_rpB || !(*i_rpA == *i_rpB));
+}
+
 /// Reads the file that is about to be written, in memory, and tells what would not come back.
 /// @return false if it could not be read at all, so that it must not replace a file that can.
 bool ReadsBack(const VSubjectRecord& i_rRecord, const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras)
@@ -138,7 +145,9 @@ bool VRetargetSetup::LoadTargetFBX(const boost::filesystem::path& i_rPath)
 void VRetargetSetup::CreateTargetSubject()
 {
 	constexpr const char* c_Command = "CreateTargetSubject";
-	if (!m_pFBXSkeleton)
+	// The host's question may run events, in which another file is read.
+	const std::shared_ptr<const FBXIO::VSkinSkeleton> pSkeleton = m_pFBXSkeleton;
+	if (!pSkeleton)
 		return Ignore(c_Command, Ignored::c_NoFBX);
 	VSubjectParametrised subject;
 	VSubjectApplicationData applicationData;
@@ -147,7 +156,7 @@ void VRetargetSetup::CreateTargetSubject()
 	applicationData.m_SubjectId = RetargetSetup::c_SubjectId;
 	applicationData.m_Skin = m_TargetName;
 	applicationData.m_RetargetSourceTemplate = m_SourceName;
-	RetargetSetup::BuildTargetSubject(*m_pFBXSkeleton, subject, applicationData, m_TargetRootIndex);
+	RetargetSetup::BuildTargetSubject(*pSkeleton, subject, applicationData, m_TargetRootIndex);
 	RetargetSetup::SetGlobalScale(subject, m_TargetScale);
 	if (subject.m_Segments.empty())
 	{
@@ -155,12 +164,15 @@ void VRetargetSetup::CreateTargetSubject()
 		    m_TargetRootIndex);
 		return Ignore(c_Command, Ignored::c_NoRootBone);
 	}
-	const FBXIO::VSkinBone& rRootBone = (*m_pFBXSkeleton)[m_TargetRootIndex];
-	if (!m_bTargetRootChosen)
-		TellOtherRoots(*m_pFBXSkeleton);
+	const FBXIO::VSkinBone& rRootBone = (*pSkeleton)[m_TargetRootIndex];
+	const QMatrix4x4 world = m_TargetAxisMatrix * rRootBone.m_Global;
+	const bool bRootChosen = m_bTargetRootChosen;
+	if (!MayReplaceTarget(c_Command, "Create Target Subject"))
+		return;
+	if (!bRootChosen)
+		TellOtherRoots(*pSkeleton);
 	TellTwiceTurnedRoot(rRootBone);
 
-	const QMatrix4x4 world = m_TargetAxisMatrix * rRootBone.m_Global;
 	const std::optional<Rotation::VVector3> rotation = RetargetSetup::RotationOf(world);
 	if (!rotation)
 		NVX_LOG(c_LogCategory, NVX::ELogWarning,
@@ -174,7 +186,8 @@ void VRetargetSetup::CreateTargetSubject()
 		rJoint.m_BindPose[std::size_t(3 + row)] = double(world(row, 3));
 	rJoint.m_Mean = rJoint.m_BindPose;
 	if (!SetTargetSubject(std::move(subject), std::move(applicationData)))
-		Ignore(c_Command, Ignored::c_HostRefused);
+		return Ignore(c_Command, Ignored::c_HostRefused);
+	m_MadeTarget = TargetValues();
 }
 
 bool VRetargetSetup::LoadSourceSubject(const boost::filesystem::path& i_rPath, const std::string& i_rSkinName)
@@ -243,14 +256,17 @@ std::uint32_t VRetargetSetup::SaveTargetSubject(const boost::filesystem::path& i
 	return status;
 }
 
-bool VRetargetSetup::HasUnsavedChanges() const
+bool VRetargetSetup::TargetDiffersFrom(const VSubjectValues& i_rKept) const
 {
-	const auto differs = [](const auto& i_rpNow, const auto& i_rpSaved)
-	{ return i_rpNow != i_rpSaved && (!i_rpNow || !i_rpSaved || !(*i_rpNow == *i_rpSaved)); };
 	const VSubjectValues target = TargetValues();
 	return target.m_pParametrised
-	    && (differs(target.m_pParametrised, m_SavedTarget.m_pParametrised)
-	        || differs(target.m_pApplicationData, m_SavedTarget.m_pApplicationData));
+	    && (Differ(target.m_pParametrised, i_rKept.m_pParametrised)
+	        || Differ(target.m_pApplicationData, i_rKept.m_pApplicationData));
+}
+
+bool VRetargetSetup::HasUnsavedChanges() const
+{
+	return TargetDiffersFrom(m_SavedTarget);
 }
 
 void VRetargetSetup::LoadTargetSubjectURL(const QUrl& i_rFileURL)
@@ -259,6 +275,8 @@ void VRetargetSetup::LoadTargetSubjectURL(const QUrl& i_rFileURL)
 	const boost::filesystem::path path = RetargetSetup::PathFromUrl(i_rFileURL);
 	if (path.empty())
 		return Ignore(c_Command, QString(Ignored::c_NotLocal).arg(i_rFileURL.toDisplayString()));
+	if (!MayReplaceTarget(c_Command, "Load"))
+		return;
 	switch (LoadTargetSubject(path))
 	{
 	case NVX::Status::c_Success: emit targetSubjectLoaded(i_rFileURL); break;

@@ -34,6 +34,7 @@ bool VTesselPluginRetargetSetup::CreateContent(
 	CoreGraphics::VInteractionMapper::SetActive(g_pInteractionMapper);
 	const auto pRetargetSetup = std::make_shared<VRetargetSetup>(
 	    i_rContext.GetDispatcher(), i_rContext.GetFrameFactory(), i_rContext.GetItemFactory());
+	pRetargetSetup->SetHostRules(TesselPluginInterface::HostRulesOf(i_rContext.GetApplicationObject()));
 	const auto pSelection =
 	    NVX::MakeShared<VRetargetSetupSelection>(i_rContext.GetDispatcher(), i_rContext.GetSelectionManager());
 	const bool bSceneFlag = i_rContext.GetSceneFlag();

@@ -1,0 +1,23 @@
+#include "studio/ApplicationObject.h"
+
+#include "studio/Preferences.h"
+
+namespace StudioHost
+{
+
+VApplicationObject::VApplicationObject(std::shared_ptr<const VPreferences> i_pPreferences)
+    : m_pPreferences(std::move(i_pPreferences))
+{
+}
+
+TesselPluginInterface::VHostRules VApplicationObject::Rules() const
+{
+	return {};
+}
+
+bool VApplicationObject::MayReplaceTargetSubject(const std::string& i_rAction)
+{
+	return !m_AskToReplace || m_AskToReplace(i_rAction);
+}
+
+} // namespace StudioHost

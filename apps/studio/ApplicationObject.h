@@ -1,0 +1,30 @@
+#pragma once
+
+#include "TesselPluginInterface/IHostRules.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace StudioHost
+{
+
+class VPreferences;
+
+/// This program as modules see it: the rules that its preferences set, and the question before work is lost.
+class VApplicationObject : public TesselPluginInterface::IApplicationObject, public TesselPluginInterface::IHostRules
+{
+public:
+	explicit VApplicationObject(std::shared_ptr<const VPreferences> i_pPreferences);
+
+	TesselPluginInterface::VHostRules Rules() const override;
+	bool MayReplaceTargetSubject(const std::string& i_rAction) override;
+
+	/// Asks whoever sits at the window; until it is set the answer is yes.
+	std::function<bool(const std::string& i_rAction)> m_AskToReplace;
+
+private:
+	const std::shared_ptr<const VPreferences> m_pPreferences;
+};
+
+} // namespace StudioHost
