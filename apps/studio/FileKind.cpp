@@ -41,6 +41,12 @@ EFileKind KindOf(const QString& i_rPath)
 	return EFileKind::EOther;
 }
 
+QString KindName(EFileKind i_Kind)
+{
+	const VKind* const pKind = Find(i_Kind);
+	return pKind ? pKind->m_pName : "";
+}
+
 QString Description(EFileKind i_Kind)
 {
 	const VKind* const pKind = Find(i_Kind);
@@ -54,7 +60,7 @@ QString DialogFilter(EFileKind i_Kind)
 		if (rKind.m_Kind == i_Kind)
 			for (const QString& rExtension : rKind.m_Extensions)
 				patterns << "*." + rExtension << "*." + rExtension.toUpper();
-	return QStringLiteral("%1 (%2)").arg(Description(i_Kind).section(" (", 0, 0), patterns.join(' '));
+	return QStringLiteral("%1 (%2)").arg(KindName(i_Kind), patterns.join(' '));
 }
 
 void SortByKind(QStringList& io_rPaths)

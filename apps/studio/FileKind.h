@@ -18,6 +18,9 @@ enum class EFileKind
 /// By the file's extension, in any case.
 EFileKind KindOf(const QString& i_rPath);
 
+/// "performer's skeleton"; empty for no kind.
+QString KindName(EFileKind i_Kind);
+
 /// "performer's skeleton (.qrs)".
 QString Description(EFileKind i_Kind);
 

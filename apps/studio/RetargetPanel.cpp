@@ -9,8 +9,10 @@
 #include "studio/FileKind.h"
 
 #include <QFileInfo>
+#include <QQmlComponent>
 #include <QQuickItem>
 #include <QQuickWidget>
+#include <QQuickWindow>
 
 namespace StudioHost
 {
@@ -21,6 +23,21 @@ constexpr const char* c_pDocument = "ContextRetargetSetup";
 constexpr const char* c_pParameterPath = "RetargetSetup";
 constexpr const char* c_pParameterGroup = "Subject";
 constexpr const char* c_pCurrentFile = "currentTargetSubjectURL";
+constexpr const char* c_pSource = "SourceSkeleton";
+constexpr const char* c_pFbx = "TargetFBX";
+
+/// By objectName, of what can be seen.
+const QQuickItem* ItemNamed(const QQuickItem& i_rItem, const QString& i_rName)
+{
+	if (!i_rItem.isVisible())
+		return nullptr;
+	if (i_rItem.objectName() == i_rName)
+		return &i_rItem;
+	for (const QQuickItem* pChild : i_rItem.childItems())
+		if (const QQuickItem* const pFound = ItemNamed(*pChild, i_rName))
+			return pFound;
+	return nullptr;
+}
 
 } // namespace
 
@@ -81,12 +98,48 @@ bool VRetargetPanel::Open(const QString& i_rPath)
 	}
 	switch (kind)
 	{
-	case EFileKind::ESource: return SetParameter("SourceSkeleton", path);
-	case EFileKind::EFbx: return SetParameter("TargetFBX", path);
+	case EFileKind::ESource: return SetParameter(c_pSource, path);
+	case EFileKind::EFbx: return SetParameter(c_pFbx, path);
 	default:
 		return QMetaObject::invokeMethod(
 		    m_pDocument, "LoadTargetSubjectURL", Qt::DirectConnection, Q_ARG(QUrl, QUrl::fromLocalFile(path)));
 	}
+}
+
+QRectF VRetargetPanel::PlaceOf(EFileKind i_Kind) const
+{
+	const char* const pName = i_Kind == EFileKind::ESource ? c_pSource
+	    : i_Kind == EFileKind::EFbx                        ? c_pFbx
+	    : i_Kind == EFileKind::ETarget                     ? "currentFile"
+	                                                       : nullptr;
+	const auto* const pRoot = qobject_cast<const QQuickItem*>(m_pRoot.data());
+	const QQuickItem* const pItem = pRoot && pName ? ItemNamed(*pRoot, QLatin1String(pName)) : nullptr;
+	return pItem ? pItem->mapRectToScene(pItem->boundingRect()) : QRectF();
+}
+
+void VRetargetPanel::MarkDrop(const QStringList& i_rPaths)
+{
+	m_pDropMark.reset();
+	auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data());
+	if (i_rPaths.isEmpty() || !pQuickWidget || !m_pRoot)
+		return;
+	QStringList lines;
+	QVariantList places;
+	for (const QString& rPath : i_rPaths)
+	{
+		const EFileKind kind = KindOf(rPath);
+		const QString name = QFileInfo(rPath).fileName();
+		lines << (kind == EFileKind::EOther ? tr("%1 cannot be opened").arg(name)
+		                                    : tr("%1 opens as the %2").arg(name, KindName(kind)));
+		if (const QRectF place = PlaceOf(kind); !place.isEmpty())
+			places << place;
+	}
+	// The panel lies over all widgets of the window, so what lies over the panel is part of its scene.
+	QQmlComponent component(pQuickWidget->engine(), QStringLiteral("qrc:/qml/Orlex/Controls/DropMark.qml"),
+	    QQmlComponent::PreferSynchronous);
+	m_pDropMark.reset(component.createWithInitialProperties(
+	    {{"parent", QVariant::fromValue(pQuickWidget->quickWindow()->contentItem())}, {"text", lines.join('\n')},
+	        {"places", places}}));
 }
 
 bool VRetargetPanel::SetParameter(const char* i_pName, const QString& i_rPath)

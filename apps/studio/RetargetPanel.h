@@ -2,6 +2,7 @@
 
 #include <QObject>
 #include <QPointer>
+#include <QRectF>
 #include <QString>
 #include <QUrl>
 #include <QVariant>
@@ -18,6 +19,8 @@ class IParameterRegistry;
 namespace StudioHost
 {
 
+enum class EFileKind;
+
 /// The "Retarget Setup" panel as far as this program knows it: by the names that it shows to its QML and the names of
 /// its parameters, not by its classes.
 class VRetargetPanel : public QObject
@@ -32,6 +35,9 @@ public:
 	/// Opens a file by its kind, as the panel's own controls would. Why a file is not opened is told in the log.
 	/// @return false if it was not even tried.
 	bool Open(const QString& i_rPath);
+
+	/// Shows over the panel what files are opened as, and at which of its fields. Nothing for an empty list.
+	void MarkDrop(const QStringList& i_rPaths);
 
 	/// Saves the target subject to its file; the panel asks for one if there is none.
 	void Save();
@@ -56,6 +62,8 @@ private:
 
 	bool SetParameter(const char* i_pName, const QString& i_rPath);
 	void FollowRootItem();
+	/// Where a file of this kind stands, in pixels of the panel; empty for nowhere.
+	QRectF PlaceOf(EFileKind i_Kind) const;
 
 private slots:
 	void TellIgnored(const QString& i_rCommand, const QString& i_rReason);
@@ -67,6 +75,7 @@ private:
 	const QPointer<QObject> m_pDocument;
 	const std::shared_ptr<TesselPluginInterface::IParameterRegistry> m_pParameters;
 	QPointer<QObject> m_pRoot;
+	std::unique_ptr<QObject> m_pDropMark;
 };
 
 } // namespace StudioHost

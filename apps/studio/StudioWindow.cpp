@@ -1,7 +1,7 @@
 #include "studio/StudioWindow.h"
 
 #include "DebugServices/GlobalLog.h"
-#include "studio/FileKind.h"
+#include "studio/FileDrop.h"
 #include "studio/LogModel.h"
 #include "studio/LogPanel.h"
 #include "studio/Module.h"
@@ -19,7 +19,6 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QMessageBox>
-#include <QMimeData>
 #include <QTimer>
 
 namespace StudioHost
@@ -34,15 +33,6 @@ constexpr int c_LogHeight = 180;
 const QString c_GeometryKey = QStringLiteral("Window/Geometry");
 const QString c_StateKey = QStringLiteral("Window/State");
 
-QStringList LocalFiles(const QMimeData& i_rData)
-{
-	QStringList files;
-	for (const QUrl& rUrl : i_rData.urls())
-		if (rUrl.isLocalFile())
-			files << rUrl.toLocalFile();
-	return files;
-}
-
 } // namespace
 
 VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget* i_pParent)
@@ -55,6 +45,14 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	Named(this, "StudioWindow", tr("Retarget Studio"));
 	setWindowTitle(tr("Retarget Studio"));
 	setAcceptDrops(true);
+	new VFileDrop(
+	    *this,
+	    [this](const QStringList& i_rFiles)
+	    {
+		    if (m_pRetargetPanel)
+			    m_pRetargetPanel->MarkDrop(i_rFiles);
+	    },
+	    [this](const QString& i_rFile) { Open(i_rFile); });
 	setDockNestingEnabled(true);
 	// Docks stand where they belong at once.
 	setAnimated(false);
@@ -68,6 +66,7 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	Say(tr("No module is loaded"));
 
 	m_pLogDock = Named(new QDockWidget(tr("Log"), this), "LogDock", tr("Log"));
+	m_pLogDock->setAcceptDrops(true);
 	m_pLogDock->setWidget(new VLogPanel(*m_pLog));
 	m_pLogDock->setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Maximum);
 	addDockWidget(Qt::BottomDockWidgetArea, m_pLogDock);
@@ -188,30 +187,6 @@ bool VStudioWindow::MayClose()
 		return !m_pRetargetPanel->HasUnsavedChanges();
 	default: return false;
 	}
-}
-
-void VStudioWindow::dragEnterEvent(QDragEnterEvent* i_pEvent)
-{
-	for (const QString& rFile : LocalFiles(*i_pEvent->mimeData()))
-	{
-		if (KindOf(rFile) == EFileKind::EOther)
-			continue;
-		// The files stay where they are, whatever the other side offers.
-		i_pEvent->setDropAction(Qt::CopyAction);
-		i_pEvent->accept();
-		return;
-	}
-	i_pEvent->ignore();
-}
-
-void VStudioWindow::dropEvent(QDropEvent* i_pEvent)
-{
-	QStringList files = LocalFiles(*i_pEvent->mimeData());
-	SortByKind(files);
-	i_pEvent->setDropAction(Qt::CopyAction);
-	i_pEvent->accept();
-	for (const QString& rFile : files)
-		Open(rFile);
 }
 
 void VStudioWindow::Say(const QString& i_rText)

@@ -54,8 +54,6 @@ public:
 protected:
 	void showEvent(QShowEvent* i_pEvent) override;
 	void closeEvent(QCloseEvent* i_pEvent) override;
-	void dragEnterEvent(QDragEnterEvent* i_pEvent) override;
-	void dropEvent(QDropEvent* i_pEvent) override;
 
 private:
 	void MakeMenus(bool i_bDeveloper);

@@ -1,3 +1,4 @@
+#include "../FindItem.h"
 #include "Host.h"
 
 #include "NVX/IQuickWidget.h"
@@ -26,6 +27,7 @@
 #include <QMimeData>
 #include <QQuickItem>
 #include <QQuickWidget>
+#include <QQuickWindow>
 #include <QTest>
 #include <QTimer>
 
@@ -71,8 +73,14 @@ protected:
 		return qobject_cast<QQuickWidget*>(m_pWindow->RetargetPanel()->Widget())->rootObject()->property(i_pName);
 	}
 
-	/// @return whether the window takes the files.
-	bool Drop(const QStringList& i_rFiles)
+	QQuickItem* DropMark()
+	{
+		const auto& rPanel = *qobject_cast<QQuickWidget*>(m_pWindow->RetargetPanel()->Widget());
+		return FindItem(rPanel.quickWindow()->contentItem(), "dropMark", true);
+	}
+
+	/// @return whether the files are taken on this part of the window.
+	bool Drop(const QStringList& i_rFiles, QWidget& i_rPart)
 	{
 		QMimeData data;
 		QList<QUrl> urls;
@@ -80,21 +88,28 @@ protected:
 			urls << QUrl::fromLocalFile(rFile);
 		data.setUrls(urls);
 		QDragEnterEvent enter({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, {});
-		QApplication::sendEvent(m_pWindow.get(), &enter);
+		QApplication::sendEvent(&i_rPart, &enter);
 		if (!enter.isAccepted())
 			return false;
+		const QQuickItem* const pMark = DropMark();
+		EXPECT_TRUE(pMark && pMark->isVisible());
+		m_Marked = pMark ? pMark->property("text").toString() : QString();
 		EXPECT_EQ(enter.dropAction(), Qt::CopyAction);
 		QDropEvent drop({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, {});
-		QApplication::sendEvent(m_pWindow.get(), &drop);
+		QApplication::sendEvent(&i_rPart, &drop);
+		EXPECT_FALSE(DropMark());
 		RunEvents();
 		return true;
 	}
+	bool Drop(const QStringList& i_rFiles) { return Drop(i_rFiles, *m_pWindow); }
 
 	QStringList RecentFiles() { return m_Settings.value("RecentFiles").toStringList(); }
 
 	QAction& Action(const char* i_pName) { return *m_pWindow->findChild<QAction*>(i_pName); }
 
 	std::unique_ptr<VStudioWindow> m_pWindow;
+	/// What was shown while files hung over the window.
+	QString m_Marked;
 	VMessages m_Messages;
 };
 
@@ -108,12 +123,26 @@ TEST_F(Window, TakesDroppedFilesByKind)
 
 	EXPECT_FALSE(Drop({note}));
 	EXPECT_TRUE(Drop({target, note, c_Fbx, c_Source}));
+	EXPECT_EQ(m_Marked,
+	    "performer.qrs opens as the performer's skeleton\ncharacter.fbx opens as the character's FBX file\n"
+	    "performer.qrr opens as the retarget subject\nnote.txt cannot be opened");
 	EXPECT_EQ(m_Messages.Take(),
 	    "2 Import: " + note.toStdString() + " is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx");
 	EXPECT_EQ(Parameter("SourceSkeleton"), c_Source.toStdString());
 	EXPECT_EQ(Parameter("TargetFBX"), c_Fbx.toStdString());
 	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));
 	EXPECT_EQ(RecentFiles(), (QStringList{target, c_Fbx, c_Source}));
+
+	// Wherever they are let go: not even a field takes them for text.
+	auto* const pField = m_pWindow->findChild<QLineEdit*>("LogFilter");
+	for (QWidget* pPart : {m_pWindow->RetargetPanel()->Widget(), static_cast<QWidget*>(pField)})
+	{
+		EXPECT_TRUE(Drop({c_Source}, *pPart)) << pPart->objectName().toStdString();
+		EXPECT_EQ(RecentFiles().front(), c_Source);
+		EXPECT_TRUE(Drop({c_Fbx}, *pPart));
+		EXPECT_EQ(RecentFiles().front(), c_Fbx);
+	}
+	EXPECT_EQ(pField->text(), "");
 
 	// What cannot be loaded is told, and never becomes the file that is saved to.
 	EXPECT_TRUE(Drop({broken}));

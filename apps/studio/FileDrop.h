@@ -1,0 +1,36 @@
+#pragma once
+
+#include <QObject>
+#include <QStringList>
+
+#include <functional>
+
+class QWidget;
+
+namespace StudioHost
+{
+
+/// Files dropped anywhere on a window are the window's, whatever stands under the mouse.
+class VFileDrop : public QObject
+{
+public:
+	/// @param i_rWindow with the docks that float beside it; owns this.
+	/// @param i_Mark shows what hangs over the window, in the order in which it is opened; nothing for an empty list.
+	/// @param i_Open is run when the drop has been answered, so that a question holds up no other program.
+	VFileDrop(
+	    QWidget& i_rWindow, std::function<void(const QStringList&)> i_Mark, std::function<void(const QString&)> i_Open);
+
+	bool eventFilter(QObject* i_pReceiver, QEvent* io_pEvent) override;
+
+private:
+	/// Part of the window and of none of its dialogs.
+	bool IsPart(const QWidget& i_rWidget) const;
+
+	QWidget& m_rWindow;
+	const std::function<void(const QStringList&)> m_Mark;
+	const std::function<void(const QString&)> m_Open;
+	/// The drag over the window is one of files.
+	bool m_bOver = false;
+};
+
+} // namespace StudioHost
