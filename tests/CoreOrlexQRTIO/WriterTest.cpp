@@ -119,6 +119,39 @@ const VRow c_Rows[] = {
 	        c.m_Subject.m_DynamicParameters.push_back({" b", 0, 0, 1, true});
         },
         {"Parameter ' b' has blanks at the ends of its name."}},
+    {"NamesWithBlanksAtTheirEnds",
+        [](VContent& c)
+        {
+	        c.m_Subject.m_Segments[1].m_Name = "\tArm ";
+	        c.m_Subject.m_Markers[0].m_Name = " M";
+	        c.m_Subject.m_Rotations[0].m_Name = "Turn ";
+        },
+        {},
+        {"Segment '\tArm ' is written as 'Arm': a file holds no blanks at the ends of a name.",
+            "Marker ' M' is written as 'M': a file holds no blanks at the ends of a name.",
+            "Rotation observation 'Turn ' is written as 'Turn': a file holds no blanks at the ends of a name."}},
+    {"NamesThatWouldBecomeOne",
+        [](VContent& c)
+        {
+	        c.m_Subject.m_Segments[1].m_Name = "Root ";
+	        c.m_Subject.m_Markers.emplace_back().m_Name = " M";
+	        c.m_Subject.m_Rotations.push_back({" Turn", 1});
+        },
+        {"Segment 'Root' and Segment 'Root ' would have one name in a file, which holds no blanks at the ends of a "
+         "name: rename one of them.",
+            "Marker 'M' and Marker ' M' would have one name in a file, which holds no blanks at the ends of a name: "
+            "rename one of them.",
+            "Rotation observation 'Turn' and Rotation observation ' Turn' would have one name in a file, which holds "
+            "no blanks at the ends of a name: rename one of them."}},
+    {"BlackWithOpacity0",
+        [](VContent& c)
+        {
+	        c.m_ApplicationData.m_Segments[1].m_Colour = CoreOrlexTypes::c_ColourZero;
+	        c.m_ApplicationData.m_Targets[0].m_Colour = CoreOrlexTypes::c_ColourZero;
+        },
+        {},
+        {"Black with opacity 0 is no colour that a file can hold: 2 of the subject's colours come back as the default "
+         "one."}},
     {"NameWithControlByte", [](VContent& c) { c.m_Subject.m_Segments[1].m_Name = "A\x01"; },
         {"Segment node's NAME attribute has bytes that XML cannot hold.",
             "TargetLocalPointToWorldPoint node's SEGMENT attribute has bytes that XML cannot hold.",

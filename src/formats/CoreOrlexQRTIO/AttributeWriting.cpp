@@ -53,6 +53,11 @@ bool IsInVersion(const VWriterNode& i_rNode, const VAttribute& i_rAttribute)
 	return UtilsRapidXml::InRange(i_rNode.GetVersion(), i_rAttribute.m_Minimum, i_rAttribute.m_Maximum);
 }
 
+bool IsInVersion(const VWriterNode& i_rNode, const Format::VElement& i_rElement)
+{
+	return UtilsRapidXml::InRange(i_rNode.GetVersion(), i_rElement.m_Minimum, i_rElement.m_Maximum);
+}
+
 void WriteRaw(VWriterNode& io_rNode, const VAttribute& i_rAttribute, std::string_view i_Text)
 {
 	io_rNode.WriteAttribute(i_rAttribute.m_Name, i_Text, i_rAttribute.m_Minimum, i_rAttribute.m_Maximum);

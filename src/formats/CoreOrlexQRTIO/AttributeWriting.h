@@ -16,8 +16,9 @@ namespace CoreOrlexQRTIO
 /// "Could not stringify %1% node's %2% attribute value."
 void AddNotStringified(UtilsRapidXml::VWriterNode& io_rNode, const Format::VAttribute& i_rAttribute);
 
-/// True if the version being written has the attribute.
+/// True if the version being written has the attribute, or the element.
 bool IsInVersion(const UtilsRapidXml::VWriterNode& i_rNode, const Format::VAttribute& i_rAttribute);
+bool IsInVersion(const UtilsRapidXml::VWriterNode& i_rNode, const Format::VElement& i_rElement);
 
 /// As it stands, without looking at the value.
 void WriteRaw(UtilsRapidXml::VWriterNode& io_rNode, const Format::VAttribute& i_rAttribute, std::string_view i_Text);

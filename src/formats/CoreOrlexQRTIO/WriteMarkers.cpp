@@ -39,13 +39,14 @@ void WriteMarker(VWriterNode& io_rNode, VWriting& io_rWriting, const VMarker& i_
 		if (const std::string* const pName = NameOfSegment(io_rNode, io_rWriting, i_pTarget->m_SegmentIndices[0]))
 			WriteText(io_rNode, Table::c_Segment, *pName);
 		position = WritableExpressions(io_rWriting, i_pTarget->m_StateExpressions);
-		const bool bAsRead =
-		    !i_rExtras.m_Position.empty() && i_rExtras.m_TemplatePosition == i_pTarget->m_StateExpressions;
+		// The marker's own position is what a reader holds where there is no template to tell the target's.
+		const bool bAsRead = IsInVersion(io_rNode, Table::c_MarkerTemplate) && !i_rExtras.m_Position.empty()
+		    && i_rExtras.m_TemplatePosition == i_pTarget->m_StateExpressions;
 		WriteExpressions(io_rNode, Table::c_Position, bAsRead ? i_rExtras.m_Position : position);
 		WriteReals(io_rNode, Table::c_Covariance, i_pTarget->m_Covariance);
 	}
 	WriteReal(io_rNode, Table::c_Radius, i_rMarker.m_Radius);
-	WriteColour(io_rNode, Table::c_Colour, i_rApplicationData.m_Colour);
+	WriteColourOrCount(io_rNode, io_rWriting, Table::c_Colour, i_rApplicationData.m_Colour);
 	WriteText(io_rNode, Table::c_Descriptor, i_rExtras.m_Descriptor);
 	if (i_pTarget)
 		WriteElement(io_rNode, Table::c_MarkerTemplate,

@@ -1,6 +1,7 @@
 #include "CoreOrlexQRTIO/WritePreparation.h"
 
 #include "CoreOrlexQRTIO/Evaluation.h"
+#include "CoreOrlexQRTIO/ExpressionList.h"
 #include "CoreOrlexQRTIO/Format.h"
 #include "CoreOrlexQRTIO/Limits.h"
 #include "CoreOrlexTypes/JointType.h"
@@ -9,6 +10,7 @@
 #include <boost/format.hpp>
 
 #include <algorithm>
+#include <set>
 
 namespace CoreOrlexQRTIO
 {
@@ -147,6 +149,30 @@ void PrepareT(VWriting& io_rWriting)
 		}
 }
 
+/// Names lose blanks at their ends in a file, where two must not become one.
+bool CheckNames(VWriting& io_rWriting, const auto& i_rElements, const char* i_pKind, VTexts& io_rErrors)
+{
+	const std::size_t errors = io_rErrors.size();
+	std::unordered_map<std::string_view, std::string_view> firstOf;
+	for (const auto& rElement : i_rElements)
+	{
+		const std::string_view name = rElement.m_Name;
+		const std::string_view written = Trimmed(name);
+		const auto [it, bFirst] = firstOf.emplace(written, name);
+		if (it->second != name)
+			io_rErrors.push_back((boost::format("%1% '%2%' and %1% '%3%' would have one name in a file, which holds no "
+			                                    "blanks at the ends of a name: rename one of them.")
+			    % i_pKind % it->second % name)
+			                         .str());
+		else if (bFirst && written.size() != name.size())
+			io_rWriting.m_Warnings.push_back(
+			    (boost::format("%1% '%2%' is written as '%3%': a file holds no blanks at the ends of a name.") % i_pKind
+			        % name % written)
+			        .str());
+	}
+	return io_rErrors.size() == errors;
+}
+
 } // namespace
 
 bool Prepare(VWriting& io_rWriting, VTexts& io_rErrors)
@@ -157,7 +183,9 @@ bool Prepare(VWriting& io_rWriting, VTexts& io_rErrors)
 	io_rWriting.m_Segments.resize(rSubject.m_Segments.size());
 	if (!PrepareTree(io_rWriting, io_rErrors))
 		return false;
-	bool bFine = true;
+	bool bFine = CheckNames(io_rWriting, rSubject.m_Segments, "Segment", io_rErrors);
+	bFine &= CheckNames(io_rWriting, rSubject.m_Markers, "Marker", io_rErrors);
+	bFine &= CheckNames(io_rWriting, rSubject.m_Rotations, "Rotation observation", io_rErrors);
 	VRecordsByName<VSubjectQRTExtras::VSegment> extras(io_rWriting.m_rExtras.m_Segments);
 	for (std::size_t i = 0; i < rSubject.m_Segments.size(); ++i)
 	{
@@ -182,13 +210,23 @@ bool Prepare(VWriting& io_rWriting, VTexts& io_rErrors)
 std::vector<std::string> WritableExpressions(VWriting& io_rWriting, std::span<const std::string> i_Expressions)
 {
 	VTexts texts(i_Expressions.begin(), i_Expressions.end());
-	if (!io_rWriting.m_Version.IsSet() || io_rWriting.m_Version >= Format::c_2_0
-	    || io_rWriting.m_rSubject.m_StaticParameters.empty())
+	const auto& rStatic = io_rWriting.m_rSubject.m_StaticParameters;
+	if (!io_rWriting.m_Version.IsSet() || io_rWriting.m_Version >= Format::c_2_0 || rStatic.empty())
 		return texts;
+	const auto usesStatic = [&](const std::string& i_rText)
+	{
+		std::set<std::string> names;
+		std::string error;
+		return io_rWriting.m_rParser.EvaluateChecked(i_rText, names, error)
+		    && std::ranges::any_of(rStatic,
+		        [&](const VSubjectParametrised::VStaticParameter& i_rParameter)
+		        { return names.contains(i_rParameter.m_Name); });
+	};
 	double value = 0.0;
 	std::string error;
 	for (std::string& rText : texts)
-		if (!NumberText::ScanWholeReal(rText, value) && io_rWriting.m_rParser.Evaluate(rText, value, error))
+		if (!NumberText::ScanWholeReal(rText, value) && usesStatic(rText)
+		    && io_rWriting.m_rParser.Evaluate(rText, value, error))
 			rText = NumberText::PrintG17(value);
 	return texts;
 }

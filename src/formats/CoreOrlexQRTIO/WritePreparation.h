@@ -66,6 +66,7 @@ struct VWriting
 	/// Unset: everything is written.
 	UtilsRapidXml::VVersion m_Version;
 	std::vector<std::string> m_Warnings{};
+	std::size_t m_CountOfLostColours = 0;
 	std::vector<VPreparedSegment> m_Segments{};
 	/// Where a name stands first, which is what a reference to it finds.
 	std::unordered_map<std::string_view, std::uint32_t> m_FirstSegments{};
@@ -77,7 +78,8 @@ struct VWriting
 /// @return false, with errors added, if the subject's segments cannot be written so that they could be read again.
 bool Prepare(VWriting& io_rWriting, std::vector<std::string>& io_rErrors);
 
-/// The expressions as the version being written can hold them: without static parameters, numbers.
+/// The expressions as the version being written can hold them: numbers for those that use static parameters which it
+/// does not have.
 std::vector<std::string> WritableExpressions(VWriting& io_rWriting, std::span<const std::string> i_Expressions);
 
 } // namespace CoreOrlexQRTIO

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "CoreOrlexQRTIO/Format.h"
 #include "CoreOrlexQRTIO/WritePreparation.h"
 #include "UtilsRapidXml/WriterNode.h"
 
@@ -19,6 +20,11 @@ void WriteSubspaces(UtilsRapidXml::VWriterNode& io_rNode, VWriting& io_rWriting)
 /// that stands for an earlier element too adds a warning, since that one is what a reader finds.
 const std::string* NameOfSegment(UtilsRapidXml::VWriterNode& io_rNode, VWriting& io_rWriting, std::uint32_t i_Index);
 const std::string* NameOfMarker(UtilsRapidXml::VWriterNode& io_rNode, VWriting& io_rWriting, std::uint32_t i_Index);
+
+/// The colour of an element that a reader gives the default one if it finds none, as with black of opacity 0, which is
+/// counted.
+void WriteColourOrCount(UtilsRapidXml::VWriterNode& io_rNode, VWriting& io_rWriting,
+    const Format::VAttribute& i_rAttribute, const CoreOrlexTypes::VColour& i_rColour);
 
 /// The record at an index, or a default one if the application data is shorter than the subject.
 template <typename T>

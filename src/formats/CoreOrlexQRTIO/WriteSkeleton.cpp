@@ -96,7 +96,7 @@ void WriteJoint(VWriterNode& io_rNode, const VSubjectParametrised::VSegment& i_r
 	WriteText(io_rNode, Table::c_Mass, rSegment.m_MassExpression);
 	WriteExpressions(io_rNode, Table::c_MassCentre, rSegment.m_MassCentreExpressions);
 	WriteExpressions(io_rNode, Table::c_Inertia, rSegment.m_RadiusOfGyrationExpressions);
-	WriteColour(io_rNode, Table::c_Colour, rApplicationData.m_Colour);
+	WriteColourOrCount(io_rNode, io_rWriting, Table::c_Colour, rApplicationData.m_Colour);
 	WriteText(io_rNode, Table::c_Context, rApplicationData.m_Context);
 	WriteBool(io_rNode, Table::c_Hidden, !rApplicationData.m_Visible);
 	WriteReal(io_rNode, Table::c_DrawEndRatio, rApplicationData.m_DrawEndRatio);
@@ -132,7 +132,7 @@ void WriteSegment(VWriterNode& io_rNode, VWriting& io_rWriting, std::uint32_t i_
 
 void WriteSkeleton(VWriterNode& io_rNode, VWriting& io_rWriting)
 {
-	WriteColour(io_rNode, Format::Skeleton::c_Colour, io_rWriting.m_rApplicationData.m_Colour);
+	WriteColourOrCount(io_rNode, io_rWriting, Format::Skeleton::c_Colour, io_rWriting.m_rApplicationData.m_Colour);
 	for (const std::uint32_t root : io_rWriting.m_Roots)
 		WriteElement(io_rNode, Format::Skeleton::c_Segment,
 		    [&](VWriterNode& io_rSegment) { WriteSegment(io_rSegment, io_rWriting, root); });

@@ -140,7 +140,7 @@ void WriteTarget(VWriterNode& io_rNode, VWriting& io_rWriting, const VTargetKind
 	}
 	if (bRotation)
 		WriteCalibrationAxes(io_rNode, io_rWriting, i_rTarget, rName, i_rAxisAsRead);
-	WriteColour(io_rNode, Table::c_Colour, i_rApplicationData.m_Colour);
+	WriteColourOrCount(io_rNode, io_rWriting, Table::c_Colour, i_rApplicationData.m_Colour);
 	if (const std::string* const pName = NameOfSegment(io_rNode, io_rWriting, i_rTarget.m_SegmentIndices[0]))
 		WriteText(io_rNode, Table::c_Segment, *pName);
 	if (i_rKind.HasMarker())

@@ -125,6 +125,13 @@ const std::string* NameOfMarker(VWriterNode& io_rNode, VWriting& io_rWriting, st
 	    io_rNode, io_rWriting, io_rWriting.m_rSubject.m_Markers, io_rWriting.m_FirstMarkers, i_Index, "marker");
 }
 
+void WriteColourOrCount(VWriterNode& io_rNode, VWriting& io_rWriting, const Format::VAttribute& i_rAttribute,
+    const CoreOrlexTypes::VColour& i_rColour)
+{
+	io_rWriting.m_CountOfLostColours += i_rColour == CoreOrlexTypes::c_ColourZero;
+	WriteColour(io_rNode, i_rAttribute, i_rColour);
+}
+
 void WriteParameters(VWriterNode& io_rNode, VWriting& io_rWriting)
 {
 	// Texts lose blanks at their ends, and then the expressions that use the name would not find it.
@@ -210,6 +217,12 @@ bool VWriter::WriteText(const VSubjectParametrised& i_rSubject, const VSubjectAp
 		root.SetVersion(writing.m_Version);
 		WriteElement(
 		    root, Format::KinematicModel::c_Element, [&](VWriterNode& io_rModel) { WriteModel(io_rModel, writing); });
+		if (writing.m_CountOfLostColours > 0)
+			writing.m_Warnings.push_back(
+			    (boost::format("Black with opacity 0 is no colour that a file can hold: %1% of the subject's colours "
+			                   "come back as the default one.")
+			        % writing.m_CountOfLostColours)
+			        .str());
 		o_rErrors = root.GetGlobalInfo()->m_Errors.GetTexts();
 		if (o_rErrors.empty())
 			o_rText = document.Print();
