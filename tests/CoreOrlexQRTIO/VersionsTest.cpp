@@ -4,6 +4,7 @@
 #include "UtilsRapidXml/Attributes.h"
 
 #include <boost/algorithm/string/join.hpp>
+#include <boost/algorithm/string/replace.hpp>
 
 #include <array>
 #include <sstream>
@@ -215,6 +216,43 @@ TEST_P(FrozenFile, TakesASubjectOfTheLatestVersion)
 	EXPECT_TRUE(again.m_bRead) << boost::join(again.m_Errors, "\n");
 	EXPECT_EQ(again.m_Warnings, c_WrittenFileWarnings);
 	EXPECT_TRUE(WriteText(again, m_VersionValue) == first);
+}
+
+/// Without templates of markers a reader holds a marker's own position, and without static parameters only numbers.
+TEST(Versions, OldestHoldTheStateOfAMarkersTarget)
+{
+	const VContent content = ReadText(boost::replace_first_copy(
+	    boost::replace_first_copy(DataText("version-2.6.qrs"), "POSITION=\"1 0 0\"", "POSITION=\"Height 0 0\""),
+	    "POSITION=\"0 2*Scale 0\"", "POSITION=\"0 2*Height 0\""));
+	ASSERT_EQ(content.m_Extras.m_Markers[0].m_Position[0], "Height");
+	for (const char* const pVersion : {"1.0", "1.5"})
+	{
+		const VContent again = ReadText(WriteText(content, VersionValueFromText(pVersion).value()));
+		EXPECT_EQ(again.m_Warnings, c_WrittenFileWarnings) << pVersion;
+		EXPECT_EQ(again.m_Subject.m_Targets[0].m_StateExpressions, VTexts({"1*Scale", "0", "0"})) << pVersion;
+		EXPECT_EQ(again.m_Subject.m_Targets[1].m_StateExpressions, VTexts({"0", "3400", "0"})) << pVersion;
+	}
+}
+
+/// Of several that share what identifies them, each is compared with the one at its place.
+TEST(Versions, NothingIsLostOfElementsThatShareTheirIdentity)
+{
+	VContent content = ReadText(DataText("version-3.5.qrs"));
+	const auto losses = [&]
+	{
+		return ListVersionLosses(
+		    content.m_Subject, content.m_ApplicationData, content.m_Extras, VersionValueFromText("3.5").value());
+	};
+	auto& rTargets = content.m_Subject.m_Targets;
+	for (int i = 0; i < 20; ++i)
+	{
+		rTargets.push_back(rTargets[5]);
+		rTargets.back().m_Weight = i;
+		content.m_ApplicationData.m_Targets.push_back(content.m_ApplicationData.m_Targets[5]);
+	}
+	EXPECT_EQ(losses(), VTexts());
+	content.m_Subject.m_Segments[6].m_Name = "Knee";
+	EXPECT_EQ(losses(), VTexts());
 }
 
 TEST(Versions, LossesAreCounted)

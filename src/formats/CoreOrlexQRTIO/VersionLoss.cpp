@@ -210,14 +210,32 @@ std::optional<TWhole> At(const auto& i_rElements, const auto& i_rDisplays, std::
 	return TWhole{i_rElements[i_Index], i_rDisplays[i_Index]};
 }
 
-/// Index of the first element of each name.
-std::unordered_map<std::string, std::size_t> IndexByName(const auto& i_rElements)
+/// Finds the elements of a list by a key: of several that share it, the first, then the second and so on.
+class VIndicesByKey
 {
-	std::unordered_map<std::string, std::size_t> indices;
-	for (std::size_t i = 0; i < i_rElements.size(); ++i)
-		indices.emplace(i_rElements[i].m_Name, i);
-	return indices;
-}
+public:
+	template <typename T>
+	VIndicesByKey(const std::vector<T>& i_rElements, const auto& i_rKey)
+	{
+		for (std::size_t i = i_rElements.size(); i-- > 0;)
+			m_Rest[i_rKey(i_rElements[i])].push_back(i);
+	}
+
+	/// Each index once; nothing when all of the key are taken.
+	std::optional<std::size_t> Take(const std::string& i_rKey)
+	{
+		const auto found = m_Rest.find(i_rKey);
+		if (found == m_Rest.end() || found->second.empty())
+			return std::nullopt;
+		const std::size_t index = found->second.back();
+		found->second.pop_back();
+		return index;
+	}
+
+private:
+	/// Last first.
+	std::unordered_map<std::string, std::vector<std::size_t>> m_Rest;
+};
 
 /// What a target ties together, which identifies it in another order of the list.
 std::string TiesOf(const VSubjectParametrised& i_rSubject, const VSubjectParametrised::VTarget& i_rTarget)
@@ -236,16 +254,15 @@ std::string TiesOf(const VSubjectParametrised& i_rSubject, const VSubjectParamet
 
 void AddSegments(const VContent& i_rBefore, const VContent& i_rAfter, VLosses& io_rLosses)
 {
-	const auto after = IndexByName(i_rAfter.m_Subject.m_Segments);
+	VIndicesByKey after(i_rAfter.m_Subject.m_Segments, [](const auto& i_rSegment) { return i_rSegment.m_Name; });
 	std::vector<std::pair<VWholeSegment, VWholeSegment>> pairs;
 	for (std::size_t i = 0; i < i_rBefore.m_Subject.m_Segments.size(); ++i)
 	{
-		const auto found = after.find(i_rBefore.m_Subject.m_Segments[i].m_Name);
-		if (found == after.end())
+		const std::optional<std::size_t> found = after.Take(i_rBefore.m_Subject.m_Segments[i].m_Name);
+		if (!found)
 			continue;
 		const auto a = At<VWholeSegment>(i_rBefore.m_Subject.m_Segments, i_rBefore.m_ApplicationData.m_Segments, i);
-		const auto b =
-		    At<VWholeSegment>(i_rAfter.m_Subject.m_Segments, i_rAfter.m_ApplicationData.m_Segments, found->second);
+		const auto b = At<VWholeSegment>(i_rAfter.m_Subject.m_Segments, i_rAfter.m_ApplicationData.m_Segments, *found);
 		if (a && b)
 			pairs.emplace_back(*a, *b);
 	}
@@ -280,22 +297,20 @@ void AddMarkers(const VContent& i_rBefore, const VContent& i_rAfter, VLosses& io
 void AddTargets(const VContent& i_rBefore, const VContent& i_rAfter, VLosses& io_rLosses)
 {
 	const auto& rAfter = i_rAfter.m_Subject.m_Targets;
-	std::unordered_multimap<std::string, std::size_t> after;
-	for (std::size_t i = rAfter.size(); i-- > 0;)
-		after.emplace(TiesOf(i_rAfter.m_Subject, rAfter[i]), i);
+	VIndicesByKey after(rAfter, [&](const auto& i_rTarget) { return TiesOf(i_rAfter.m_Subject, i_rTarget); });
 	std::vector<std::pair<VWholeTarget, VWholeTarget>> pairs;
 	std::size_t lost = 0;
 	for (std::size_t i = 0; i < i_rBefore.m_Subject.m_Targets.size(); ++i)
 	{
-		const auto found = after.find(TiesOf(i_rBefore.m_Subject, i_rBefore.m_Subject.m_Targets[i]));
-		if (found == after.end())
+		const std::optional<std::size_t> found =
+		    after.Take(TiesOf(i_rBefore.m_Subject, i_rBefore.m_Subject.m_Targets[i]));
+		if (!found)
 		{
 			++lost;
 			continue;
 		}
 		const auto a = At<VWholeTarget>(i_rBefore.m_Subject.m_Targets, i_rBefore.m_ApplicationData.m_Targets, i);
-		const auto b = At<VWholeTarget>(rAfter, i_rAfter.m_ApplicationData.m_Targets, found->second);
-		after.erase(found);
+		const auto b = At<VWholeTarget>(rAfter, i_rAfter.m_ApplicationData.m_Targets, *found);
 		if (a && b)
 			pairs.emplace_back(*a, *b);
 	}
