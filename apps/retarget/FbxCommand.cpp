@@ -137,6 +137,7 @@ VJson SkinToJson(FBXIO::FBXReader& io_rReader)
 EExitStatus ShowFbx(const VFbxSettings& i_rSettings)
 {
 	FBXIO::FBXReader reader;
+	reader.SetMeshRules(FBXIO::c_FaithfulMeshes);
 	if (!reader.LoadFile(i_rSettings.m_File))
 		throw VCommandError(EBadInput, "\"" + i_rSettings.m_File + "\" could not be read as FBX");
 	VJson result = VJson::object();

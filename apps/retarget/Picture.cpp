@@ -71,6 +71,7 @@ QImage Draw(VSession& io_rSession, const VRenderSettings& i_rSettings)
 {
 	const QSize size(i_rSettings.m_Width, i_rSettings.m_Height);
 	const auto pSkins = NVX::MakeShared<OrlexGraphics::VSkinCache>(io_rSession.Dispatcher());
+	pSkins->SetMeshRules(FBXIO::c_FaithfulMeshes);
 	if (!i_rSettings.m_Skins.empty())
 		pSkins->SetFolders(OrlexGraphics::c_pSubjectSkins, {UtilsFileSystem::PathFromUtf8(i_rSettings.m_Skins)});
 	const auto pScene =

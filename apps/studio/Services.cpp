@@ -50,6 +50,7 @@ VPluginGui::VPluginGui(
       m_pQuickEngine(std::make_shared<VQuickEngine>(i_bDeveloper, QmlServices(i_rContext, std::move(i_RunCommand)))),
       m_pPanelManager(new VPanelManager(i_rWindow))
 {
+	m_pSkinCache->SetMeshRules(FBXIO::c_FaithfulMeshes);
 }
 
 VPluginGui::~VPluginGui()

@@ -52,6 +52,7 @@ TEST(OtherFiles, AreReadAsTheTableTells)
 		SCOPED_TRACE(rRow[0]);
 		VTestLog log("FBXIO");
 		FBXReader reader;
+		reader.SetMeshRules(c_FaithfulMeshes);
 		const bool bLoaded = reader.LoadFile((folder / rRow[0]).string());
 		EXPECT_EQ(bLoaded, !rRow[6].starts_with("refused"));
 		if (!bLoaded)

@@ -93,6 +93,7 @@ inline std::string WhatIsUnsound(
 		if (what.empty() && !IsFinite(rPlaced.m_Transform))
 			what = "the place of " + rPlaced.m_Name + " is not finite";
 	}
+	io_rReader.SetMeshRules(FBXIO::c_FaithfulMeshes);
 	io_rReader.ReadSkin(o_rSkin);
 	if (what.empty() && o_rSkin.m_pSkeleton)
 		what = UnsoundBone(*o_rSkin.m_pSkeleton);

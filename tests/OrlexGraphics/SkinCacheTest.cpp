@@ -158,6 +158,18 @@ TEST_F(SkinCache, LoadsSkinsOfAGroupInTheBackground)
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_Disposed);
 }
 
+TEST_F(SkinCache, ReadsMeshesByItsRules)
+{
+	boost::filesystem::copy_file(RETARGET_TEST_DATA "/fbx/heaps_biped_zup_a7100.fbx", m_Root / "a/Hero.fbx");
+	SetFolders({m_Root / "a"});
+	Load("Hero");
+	EXPECT_NE(TakeLog().find("4 polygon vertices of mesh Skeleton01 are moved"), std::string::npos);
+	m_pCache->SetMeshRules(FBXIO::c_FaithfulMeshes);
+	SetFolders({m_Root / "b", m_Root / "a"});
+	EXPECT_EQ(Load("Hero"), SkinStatus::c_Ready);
+	EXPECT_EQ(TakeLog().find("moved"), std::string::npos);
+}
+
 TEST_F(SkinCache, LoadsAtOnceWithoutABackground)
 {
 	WriteHero("a/Hero.fbx");

@@ -38,6 +38,7 @@ public:
 		m_Session.LoadTarget(i_rSubject);
 		m_Session.LoadSource(c_Performer);
 		const auto pSkins = NVX::MakeShared<OrlexGraphics::VSkinCache>(m_Session.Dispatcher());
+		pSkins->SetMeshRules(FBXIO::c_FaithfulMeshes);
 		pSkins->SetFolders(OrlexGraphics::c_pSubjectSkins, {Data("fbx")});
 		m_pScene = NVX::MakeShared<VRetargetSetupScene>(std::make_shared<CoreGraphics::VShaderLibrary>(),
 		    m_Session.Dispatcher(), m_pSelection, pSkins, m_Session.SharedDocument(),

@@ -91,6 +91,9 @@ TEST(Fbx, ShowsWhatTheReaderFinds)
 	EXPECT_EQ(rSkin.at("vertexCount"), rMesh["vertexCount"]);
 	EXPECT_EQ(rSkin.at("partCount"), 1u);
 	EXPECT_EQ(rSkin.at("influences"), VJson({0, 0, 14, 18, 0}));
+	// Control points that share a texture coordinate stay apart: 572 coordinates for 573 vertices.
+	const VJson shared = RunJson({"fbx", Data("fbx/heaps_biped_zup_a7100.fbx"), "--skin"}, folder);
+	EXPECT_EQ(shared.at("skin").at("meshes")[0].at("vertexCount"), 573u);
 }
 
 TEST(Dump, SpellsAsTheSchemaDoes)

@@ -126,13 +126,15 @@ void FBXIO::FBXMeshReader::Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TV
 }
 
 template <typename TVertex>
-void FBXIO::FBXMeshReader::Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh)
+void FBXIO::FBXMeshReader::Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VSeams* i_pSeams, VMesh<TVertex>& io_rMesh)
 {
 	// A mesh may be read placed and once more with its skin.
 	const bool bTell = m_Told.insert(&i_rNode).second;
 	const int* const pVertices = io_rFrom.GetPolygonVertices();
 	std::vector<std::uint32_t> indices(pVertices, pVertices + io_rFrom.GetPolygonVertexCount());
-	ApplyTexCoords(io_rFrom, bTell ? i_rNode.GetName() : nullptr, io_rMesh.m_Vertices, indices);
+	const std::size_t moved =
+	    ApplyTexCoords(io_rFrom, i_pSeams, bTell ? i_rNode.GetName() : nullptr, io_rMesh.m_Vertices, indices);
+	m_Moved += bTell ? moved : 0;
 	if (bTell && io_rFrom.GetElementMaterialCount() == 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning, "Missing material for mesh %1%", io_rFrom.GetName());
 	if (io_rMesh.m_Vertices.size() < c_FirstLargeCount)
@@ -196,10 +198,11 @@ std::string FBXIO::FBXMeshReader::FindTexture(const FbxFileTexture& i_rTexture) 
 bool FBXIO::FBXMeshReader::ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh)
 {
 	FbxMesh* const pMesh = i_rNode.GetMesh();
-	if (!pMesh || !Take(i_rNode, *pMesh, sizeof(VBasicVertex)))
+	std::optional<VSeams> seams;
+	if (!pMesh || !TakeMesh(i_rNode, *pMesh, sizeof(VBasicVertex), 0, seams))
 		return false;
 	Prepare(i_rNode, *pMesh, o_rMesh);
-	Finish(i_rNode, *pMesh, o_rMesh);
+	Finish(i_rNode, *pMesh, seams ? &*seams : nullptr, o_rMesh);
 	return true;
 }
 
@@ -215,22 +218,37 @@ void FBXIO::FBXMeshReader::ReadPlacedMesh(FbxNode& i_rNode, std::vector<VPlacedM
 		io_rMeshes.push_back(std::move(placed));
 }
 
-bool FBXIO::FBXMeshReader::Take(
-    FbxNode& i_rNode, FbxMesh& io_rFrom, std::size_t i_VertexSize, std::uint64_t i_MoreBytes)
+bool FBXIO::FBXMeshReader::Take(FbxNode& i_rNode, std::uint64_t i_Bytes)
 {
-	FbxGeometryElementUV* const pUV = io_rFrom.GetElementUV(0);
-	const std::uint64_t points = io_rFrom.GetControlPointsCount();
-	const std::uint64_t vertices = points + (pUV ? pUV->GetDirectArray().GetCount() : 0);
-	// Of each polygon vertex one index, and the indices of a triangle.
-	const std::uint64_t bytes = i_MoreBytes + vertices * i_VertexSize + points * Limits::c_PointBytes
-	    + io_rFrom.GetPolygonVertexCount() * std::uint64_t(16) + i_rNode.GetMaterialCount() * Limits::c_PartBytes;
-	const bool bEnough = bytes <= m_BytesLeft;
+	const bool bEnough = i_Bytes <= m_BytesLeft;
 	if (bEnough)
-		m_BytesLeft -= bytes;
+		m_BytesLeft -= i_Bytes;
 	else if (m_Told.insert(&i_rNode).second)
 		NVX_LOG("FBXIO", NVX::ELogWarning, "Mesh %1% left out because the meshes of the file are too large",
 		    i_rNode.GetName());
 	return bEnough;
+}
+
+bool FBXIO::FBXMeshReader::TakeMesh(FbxNode& i_rNode, FbxMesh& io_rFrom, std::size_t i_VertexSize,
+    std::uint64_t i_MoreBytes, std::optional<VSeams>& o_rSeams)
+{
+	if (!Take(i_rNode,
+	        i_MoreBytes + io_rFrom.GetControlPointsCount() * (i_VertexSize + Limits::c_PointBytes)
+	            + io_rFrom.GetPolygonVertexCount() * Limits::c_CornerBytes
+	            + i_rNode.GetMaterialCount() * Limits::c_PartBytes))
+		return false;
+	o_rSeams = FindSeams(io_rFrom, m_Rules.m_VertexKey);
+	return !o_rSeams || Take(i_rNode, o_rSeams->m_Vertices.size() * (i_VertexSize + sizeof(VSeams::VVertex)));
+}
+
+void FBXIO::FBXMeshReader::EndMeshes()
+{
+	if (m_Moved > 0)
+		NVX_LOG("FBXIO", NVX::ELogInformation,
+		    "%1% polygon vertices of %2% are moved in all: its meshes are not drawn as the file means them. Told apart "
+		    "by control point, too, the vertices stay",
+		    m_Moved, m_Path);
+	m_Moved = 0;
 }
 
 std::int64_t FBXIO::FBXMeshReader::FindBone(FbxCluster& i_rCluster)
@@ -307,7 +325,8 @@ void FBXIO::FBXMeshReader::ReadSkinMesh(FbxNode& i_rNode, std::vector<VSkinMesh>
 	ForEachCluster(*pSkin,
 	    [&bytes](FbxCluster& i_rCluster)
 	    { bytes += Limits::c_ClusterBytes + i_rCluster.GetControlPointIndicesCount() * std::uint64_t(8); });
-	if (!Take(i_rNode, *pMesh, sizeof(VSkinVertex), bytes))
+	std::optional<VSeams> seams;
+	if (!TakeMesh(i_rNode, *pMesh, sizeof(VSkinVertex), bytes, seams))
 		return;
 	VBoundClusters clusters;
 	ForEachCluster(*pSkin,
@@ -327,5 +346,5 @@ void FBXIO::FBXMeshReader::ReadSkinMesh(FbxNode& i_rNode, std::vector<VSkinMesh>
 		rMesh.m_Vertices[point].m_BoneWeights = read.m_Points[point].m_Weights;
 	}
 	TellSkinWeights(read, i_rNode.GetName());
-	Finish(i_rNode, *pMesh, rMesh);
+	Finish(i_rNode, *pMesh, seams ? &*seams : nullptr, rMesh);
 }

@@ -3,6 +3,8 @@
 #include "FBXIO/ImageCache.h"
 #include "FBXIO/Limits.h"
 #include "FBXIO/Mesh.h"
+#include "FBXIO/MeshRules.h"
+#include "FBXIO/Seams.h"
 
 #include <fbxsdk.h>
 
@@ -26,10 +28,15 @@ public:
 	/// The skeleton whose bones clusters are found in; the last bone of each name.
 	void SetSkeleton(std::shared_ptr<VSkinSkeleton> i_pSkeleton);
 
+	void SetRules(const VMeshRules& i_rRules) { m_Rules = i_rRules; }
+
 	static bool IsMesh(FbxNode& i_rNode);
 
 	/// Before all meshes of the scene are read once more: they count against the limit from here on.
 	void BeginMeshes() { m_BytesLeft = Limits::MeshBytes(m_FileBytes); }
+
+	/// After that: what is told of all of them together.
+	void EndMeshes();
 
 	/// In the node's own space. False if the mesh is damaged.
 	bool ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh);
@@ -50,9 +57,12 @@ private:
 	template <typename TVertex>
 	void Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& o_rMesh);
 	template <typename TVertex>
-	void Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& io_rMesh);
-	/// False, and told, if the mesh is beyond the limit.
-	bool Take(FbxNode& i_rNode, FbxMesh& io_rFrom, std::size_t i_VertexSize, std::uint64_t i_MoreBytes = 0);
+	void Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VSeams* i_pSeams, VMesh<TVertex>& io_rMesh);
+	/// False, and told, if the meshes are beyond the limit with so much more.
+	bool Take(FbxNode& i_rNode, std::uint64_t i_Bytes);
+	/// For a whole mesh with what it needs beyond vertices. Finds its seams, whose vertices are part of it.
+	bool TakeMesh(FbxNode& i_rNode, FbxMesh& io_rFrom, std::size_t i_VertexSize, std::uint64_t i_MoreBytes,
+	    std::optional<VSeams>& o_rSeams);
 	/// Without indices. Read once: any number of nodes may share a material, and it any number of textures.
 	const VMeshPart& PartOf(FbxSurfaceMaterial* i_pMaterial);
 	void ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPart& io_rPart);
@@ -70,6 +80,9 @@ private:
 	std::unordered_map<std::string, std::int64_t> m_BoneOfName;
 	float m_UnitScale = 1.0f;
 	std::uint64_t m_BytesLeft = 0;
+	VMeshRules m_Rules;
+	/// Polygon vertices that were moved, and were told mesh by mesh.
+	std::size_t m_Moved = 0;
 	/// Nodes whose meshes' findings have been told.
 	std::set<const FbxNode*> m_Told;
 	/// Skins whose bones have been looked for, and clusters of which it was told that theirs is missing or damaged.

@@ -216,9 +216,10 @@ void FBXIO::FBXReader::VImpl::ReadEachMesh(const std::function<void(FbxNode&)>& 
 	for (std::size_t i = 0; i < meshes.size(); ++i)
 	{
 		if (m_Progress && !m_Progress(float(i) / float(meshes.size())))
-			return;
+			break;
 		i_rRead(*meshes[i]);
 	}
+	m_MeshReader.EndMeshes();
 }
 
 bool FBXIO::FBXReader::VImpl::ProcessSkeletonNode(FbxNode* i_pNode)
@@ -271,6 +272,11 @@ void FBXIO::FBXReader::SetProgress(VProgress i_Progress)
 	m_pImpl->m_Progress = std::move(i_Progress);
 }
 
+void FBXIO::FBXReader::SetMeshRules(const VMeshRules& i_rRules)
+{
+	m_pImpl->m_MeshReader.SetRules(i_rRules);
+}
+
 bool FBXIO::FBXReader::IsComplete() const
 {
 	return m_pImpl->m_bComplete;
@@ -306,6 +312,7 @@ void FBXIO::FBXReader::ReadTopMesh(VBasicMesh& o_rMesh)
 {
 	m_pImpl->m_MeshReader.BeginMeshes();
 	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadMesh(i_rNode, o_rMesh); }, true);
+	m_pImpl->m_MeshReader.EndMeshes();
 }
 
 void FBXIO::FBXReader::ReadSkin(VSkin& o_rSkin)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "FBXIO/Mesh.h"
+#include "FBXIO/MeshRules.h"
 
 #include <functional>
 #include <memory>
@@ -31,6 +32,9 @@ public:
 	/// meshes are left out.
 	using VProgress = std::function<bool(float)>;
 	void SetProgress(VProgress i_Progress);
+
+	/// For the meshes that are read from now on.
+	void SetMeshRules(const VMeshRules& i_rRules);
 
 	/// False if the import broke off: what was read until then is there.
 	bool IsComplete() const;

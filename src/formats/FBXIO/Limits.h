@@ -23,6 +23,9 @@ constexpr std::uint64_t MeshBytes(std::uint64_t i_FileBytes)
 /// What a control point counts as beyond its vertex: its normal, which is kept with the mesh of the file.
 inline constexpr std::uint64_t c_PointBytes = 24;
 
+/// What a polygon vertex counts as: its own index, those of a triangle, and two while its vertex is looked for.
+inline constexpr std::uint64_t c_CornerBytes = 24;
+
 /// What a material of a mesh counts as: its values, and the path of its texture.
 inline constexpr std::uint64_t c_PartBytes = 4096;
 

@@ -2,6 +2,7 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "FBXIO/Mesh.h"
+#include "FBXIO/Seams.h"
 
 #include <fbxsdk.h>
 
@@ -26,89 +27,59 @@ inline float Finite(double i_Number)
 	return Finite(i_Number, bSound);
 }
 
-/// What was made of an entry of the texture coordinates.
-struct VEntryVertex
-{
-	static constexpr std::uint32_t c_None = 0xFFFFFFFFu;
-	std::uint32_t m_Vertex = c_None;
-	/// The control point that it was made of.
-	std::uint32_t m_Point = c_None;
-};
-
-/// Gives vertices their texture coordinates. Where these are given by polygon vertex the vertices become one for each
-/// coordinate; io_rIndices, the vertices of all polygons, follow.
+/// Gives vertices their texture coordinates. Where these are given by polygon vertex the vertices become those of the
+/// seams, and so do io_rIndices, the vertices of all polygons.
+/// @param i_pSeams null if the mesh has none
 /// @param i_pName the node's, for messages: meshes of some exporters have none. Null if nothing is to be told.
+/// @return how many polygon vertices are moved to other control points
 template <typename TVertex>
-void ApplyTexCoords(
-    FbxMesh& io_rFrom, const char* i_pName, std::vector<TVertex>& io_rVertices, std::vector<std::uint32_t>& io_rIndices)
+std::size_t ApplyTexCoords(FbxMesh& io_rFrom, VSeams* i_pSeams, const char* i_pName, std::vector<TVertex>& io_rVertices,
+    std::vector<std::uint32_t>& io_rIndices)
 {
-	FbxGeometryElementUV* const pUV = io_rFrom.GetElementUV(0);
-	if (!pUV)
-		return;
-	const auto mode = pUV->GetMappingMode();
-	if (mode != FbxLayerElement::eByControlPoint && mode != FbxLayerElement::eByPolygonVertex)
-		return;
+	const FbxGeometryElementUV* const pUV = io_rFrom.GetElementUV(0);
+	if (!pUV || (!i_pSeams && pUV->GetMappingMode() != FbxLayerElement::eByControlPoint))
+		return 0;
 	const auto& rDirect = pUV->GetDirectArray();
 	std::size_t missing = 0;
 	const auto setCoordinate = [&rDirect, &missing](TVertex& o_rVertex, int i_Entry)
 	{
 		const FbxVector2 coordinate = rDirect.GetAt(i_Entry);
-		bool bSound = true;
+		bool bSound = i_Entry >= 0;
 		o_rVertex.m_TexCoord = {Finite(coordinate[0], bSound), Finite(coordinate[1], bSound)};
 		missing += bSound ? 0 : 1;
 	};
-	const auto tellMissing = [&missing, i_pName]
-	{
-		if (missing > 0 && i_pName)
-			NVX_LOG("FBXIO", NVX::ELogWarning, "%1% vertices of mesh %2% have no texture coordinate", missing, i_pName);
-	};
-	const int entries = rDirect.GetCount();
-	if (mode == FbxLayerElement::eByControlPoint)
-	{
-		for (int i = 0; i < std::min(entries, int(io_rVertices.size())); ++i)
-			setCoordinate(io_rVertices[i], i);
-		tellMissing();
-		return;
-	}
-	const auto* const pIndex = pUV->GetReferenceMode() != FbxLayerElement::eDirect ? &pUV->GetIndexArray() : nullptr;
-	std::vector<VEntryVertex> entryVertices(entries);
-	std::vector<TVertex> vertices;
-	vertices.reserve(entries);
 	std::size_t moved = 0;
-	for (int polygon = 0, count = io_rFrom.GetPolygonCount(); polygon < count; ++polygon)
+	if (i_pSeams)
 	{
-		const int start = io_rFrom.GetPolygonVertexIndex(polygon);
-		const int end = start + io_rFrom.GetPolygonSize(polygon);
-		for (int i = start; i < end; ++i)
+		for (int polygon = 0, count = io_rFrom.GetPolygonCount(); polygon < count; ++polygon)
 		{
-			const int entry = !pIndex ? i : i < pIndex->GetCount() ? pIndex->GetAt(i) : -1;
-			const std::uint32_t point = io_rIndices[i];
-			if (entry < 0 || entry >= entries)
+			const int start = io_rFrom.GetPolygonVertexIndex(polygon);
+			for (int i = start, end = start + io_rFrom.GetPolygonSize(polygon); i < end; ++i)
 			{
-				++missing;
-				io_rIndices[i] = std::uint32_t(vertices.size());
-				vertices.push_back(io_rVertices[point]);
-				continue;
+				const std::uint32_t point = i_pSeams->m_Vertices[i_pSeams->m_Indices[i]].m_Point;
+				moved +=
+				    point != io_rIndices[i] && io_rVertices[point].m_Position != io_rVertices[io_rIndices[i]].m_Position
+				    ? 1
+				    : 0;
 			}
-			VEntryVertex& rEntry = entryVertices[entry];
-			if (rEntry.m_Vertex == VEntryVertex::c_None)
-			{
-				rEntry = {std::uint32_t(vertices.size()), point};
-				vertices.push_back(io_rVertices[point]);
-				setCoordinate(vertices.back(), entry);
-			}
-			else if (rEntry.m_Point != point
-			    && io_rVertices[rEntry.m_Point].m_Position != io_rVertices[point].m_Position)
-				++moved;
-			io_rIndices[i] = rEntry.m_Vertex;
 		}
+		std::vector<TVertex> vertices;
+		vertices.reserve(i_pSeams->m_Vertices.size());
+		for (const VSeams::VVertex& rVertex : i_pSeams->m_Vertices)
+			setCoordinate(vertices.emplace_back(io_rVertices[rVertex.m_Point]), rVertex.m_Entry);
+		io_rVertices = std::move(vertices);
+		io_rIndices = std::move(i_pSeams->m_Indices);
 	}
-	io_rVertices = std::move(vertices);
+	else
+		for (int i = 0; i < std::min(rDirect.GetCount(), int(io_rVertices.size())); ++i)
+			setCoordinate(io_rVertices[i], i);
 	if (moved > 0 && i_pName)
 		NVX_LOG("FBXIO", NVX::ELogWarning,
 		    "%1% polygon vertices of mesh %2% are moved to other control points that share their texture coordinate",
 		    moved, i_pName);
-	tellMissing();
+	if (missing > 0 && i_pName)
+		NVX_LOG("FBXIO", NVX::ELogWarning, "%1% vertices of mesh %2% have no texture coordinate", missing, i_pName);
+	return moved;
 }
 
 /// Cuts polygons into fans of triangles, each for the part of its material.

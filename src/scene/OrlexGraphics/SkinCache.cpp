@@ -56,6 +56,12 @@ VSkinCache::~VSkinCache()
 	m_pDelay->Stop();
 }
 
+void VSkinCache::SetMeshRules(const FBXIO::VMeshRules& i_rRules)
+{
+	const std::lock_guard lock(m_Mutex);
+	m_MeshRules = i_rRules;
+}
+
 void VSkinCache::SetFolders(const std::string& i_rGroup, const std::vector<boost::filesystem::path>& i_rFolders)
 {
 	std::shared_ptr<FileSystemWatcher::VFileSystemWatcher> pWatcher;
@@ -117,7 +123,7 @@ std::shared_ptr<VSkinLoadJob> VSkinCache::Find(
 	if (io_rEntry.m_Path.empty())
 		return {};
 	io_rEntry.m_Status = SkinStatus::c_Loading;
-	io_rEntry.m_pJob = std::make_shared<VSkinLoadJob>(io_rEntry.m_Path, i_rName);
+	io_rEntry.m_pJob = std::make_shared<VSkinLoadJob>(io_rEntry.m_Path, i_rName, m_MeshRules);
 	m_Jobs.push_back(io_rEntry.m_pJob);
 	return io_rEntry.m_pJob;
 }

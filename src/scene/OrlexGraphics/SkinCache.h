@@ -1,5 +1,6 @@
 #pragma once
 
+#include "FBXIO/MeshRules.h"
 #include "NVX/Shared.h"
 #include "NVX/Signal.h"
 #include "NVX/Status.h"
@@ -63,6 +64,10 @@ public:
 	    std::shared_ptr<TesselPluginInterface::IJobRunner> i_pJobRunner = {}, std::unique_ptr<IDelay> i_pDelay = {});
 	~VSkinCache() override;
 
+	/// For the skins that are loaded from now on: before the first folders are set. Any other time some have other
+	/// rules.
+	void SetMeshRules(const FBXIO::VMeshRules& i_rRules);
+
 	/// Replaces the folders of a group, and forgets what was found in those before. The same list again changes
 	/// nothing.
 	void SetFolders(const std::string& i_rGroup, const std::vector<boost::filesystem::path>& i_rFolders);
@@ -125,9 +130,10 @@ private:
 	const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
 	const std::shared_ptr<TesselPluginInterface::IJobRunner> m_pJobRunner;
 	const std::unique_ptr<IDelay> m_pDelay;
-	/// Guards the groups and the jobs: scenes ask on their render threads.
+	/// Guards the groups, the rules and the jobs: scenes ask on their render threads.
 	std::mutex m_Mutex;
 	std::unordered_map<std::string, VSkinGroup> m_Groups;
+	FBXIO::VMeshRules m_MeshRules;
 	/// Begun, and not told to have ended.
 	std::vector<std::shared_ptr<VSkinLoadJob>> m_Jobs;
 	NVX::VSignal<> m_ChangedSignal;

@@ -25,8 +25,8 @@ void WarnOfParts(const CoreGraphics::VSkin& i_rSkin, bool i_bComplete, const std
 
 } // namespace
 
-VSkinLoadJob::VSkinLoadJob(boost::filesystem::path i_Path, std::string i_Name)
-    : m_Path(std::move(i_Path)), m_Name(std::move(i_Name))
+VSkinLoadJob::VSkinLoadJob(boost::filesystem::path i_Path, std::string i_Name, const FBXIO::VMeshRules& i_rRules)
+    : m_Path(std::move(i_Path)), m_Name(std::move(i_Name)), m_Rules(i_rRules)
 {
 }
 
@@ -38,6 +38,7 @@ void VSkinLoadJob::Run()
 	{
 		FBXIO::FBXReader reader;
 		FBXIO::VSkin data;
+		reader.SetMeshRules(m_Rules);
 		if (!reader.LoadFile(path))
 			NVX_LOG("VSkinCache", NVX::ELogError, "The skin %1% is not shown: %2% could not be read", m_Name, path);
 		else

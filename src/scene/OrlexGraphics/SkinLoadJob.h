@@ -10,7 +10,7 @@ class VSkinLoadJob
 {
 public:
 	/// @param i_Name as messages call the skin
-	VSkinLoadJob(boost::filesystem::path i_Path, std::string i_Name);
+	VSkinLoadJob(boost::filesystem::path i_Path, std::string i_Name, const FBXIO::VMeshRules& i_rRules);
 
 	const std::string& Name() const { return m_Name; }
 
@@ -25,6 +25,7 @@ public:
 private:
 	const boost::filesystem::path m_Path;
 	const std::string m_Name;
+	const FBXIO::VMeshRules m_Rules;
 	/// Guards what follows.
 	std::mutex m_Mutex;
 	std::uint32_t m_Status = SkinStatus::c_NotLookedFor;
