@@ -50,6 +50,21 @@ class Reader : public testing::TestWithParam<VTestForm>
 INSTANTIATE_TEST_SUITE_P(
     Forms, Reader, testing::ValuesIn(c_Forms), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
 
+/// Forms that few exporters write: values on the line after a name, a value of one byte.
+TEST(Reader, OddFormsAreRead)
+{
+	for (const char* pFile : {"ufbx_blender_279_default_a6100", "ufbx_maya_audio_b7500"})
+	{
+		SCOPED_TRACE(pFile);
+		VLoaded file(Get(RETARGET_TEST_DATA "/fbx/"s + pFile + ".fbx"));
+		EXPECT_TRUE(file.m_Reader.IsComplete());
+		std::vector<VPlacedMesh> cube;
+		file.m_Reader.ReadPlacedMeshes(cube);
+		ASSERT_EQ(cube.size(), 1u);
+		EXPECT_EQ(cube[0].m_Mesh.m_Parts.at(0).m_Indices.size(), 12u * 3 * 2);
+	}
+}
+
 TEST(Reader, WhatIsNoPlainFileIsNotFound)
 {
 	for (const std::string& rPath :

@@ -63,7 +63,8 @@ TEST(Arrays, ConvertEveryType)
 	{ return VRaw{ArrayHeader(i_Type, i_Count, 0, i_rItems.size()) + i_rItems}; };
 	const std::pair<VRaw, VNumbers> rows[]{{plain('f', Bytes(1.5f, -2.0f), 2), {1.5, -2.0}},
 	    {plain('i', Bytes(7, -8), 2), {7.0, -8.0}}, {plain('l', Bytes(std::int64_t(1) << 40), 1), {1099511627776.0}},
-	    {plain('b', "\1\xff"s, 2), {1.0, -1.0}}, {plain('c', "\3", 1), {3.0}}, {plain('d', "", 0), {}}};
+	    {plain('b', "\1\xff"s, 2), {1.0, -1.0}}, {plain('c', "\3", 1), {3.0}}, {plain('z', "\4", 1), {4.0}},
+	    {plain('y', Bytes(std::int16_t(-300)), 1), {-300.0}}, {plain('d', "", 0), {}}};
 	for (const auto& [value, expected] : rows)
 	{
 		VArrayNumbers<double> numbers;

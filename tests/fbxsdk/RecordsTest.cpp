@@ -72,11 +72,11 @@ TEST(Records, AreTheSameInEveryForm)
 TEST(Records, BinaryHasValuesOfEveryType)
 {
 	const VTestRecord record{"R",
-	    {VRaw{Bytes('C', '\1')}, VRaw{Bytes('B', '\xff')}, VRaw{Bytes('Y', std::int16_t(-2))}, VRaw{Bytes('I', -70000)},
+	    {VRaw{Bytes('C', '\1')}, VRaw{Bytes('B', '\xff')}, VRaw{Bytes('Z', '\2')}, VRaw{Bytes('Y', std::int16_t(-2))}, VRaw{Bytes('I', -70000)},
 	        VRaw{Bytes('F', 0.5f)}, VRaw{Bytes('R', 2u, "\0x"s)}, VRaw{Bytes('i', 1u, 0u, 4u, 5)}},
 	    {}};
 	for (const VTestForm& rForm : {c_Forms[1], c_Forms[2]})
-		EXPECT_EQ(Read(Write(rForm, {record})), "R(1,-1,-2,-70000,0.5,'\0x',[])"s);
+		EXPECT_EQ(Read(Write(rForm, {record})), "R(1,-1,2,-2,-70000,0.5,'\0x',[])"s);
 }
 
 struct VTextRow
@@ -110,6 +110,9 @@ INSTANTIATE_TEST_SUITE_P(Rows, TextRecords,
         VTextRow{"LeadingComma", "Content: ,\n\"QUJD\", \"REVG\"\nB: 1", "Content('QUJD','REVG') B(1)"},
         VTextRow{"Words", "Shading: T\nKey: 0,1.5,U,s,n", "Shading(T) Key(0,1.5,U,s,n)"},
         VTextRow{"NoValues", "A:\nB: 1\nC:{ D: }", "A() B(1) C(){D()}"},
+        VTextRow{"ValuesOnNextLine",
+            "Key: \n\t1,-2.5,L\nB:\n; none\nC: {\nD:\r\n\"x\",\n\"y\"\nE:\n}\nF:\n*1 {\na: 1\n}",
+            "Key(1,-2.5,L) B() C(){D('x','y') E()} F([])"},
         VTextRow{"BraceOnNextLine", "A: \"x\"\n{\nB: 1\n}", "A('x'){B(1)}"},
         VTextRow{"OneLine", "A: { B: 1 C: 2 } D: 3", "A(){B(1) C(2)} D(3)"},
         VTextRow{"Numbers", "A: +1,-0,1e3,1.#INF,-1.#INF,0x10,9223372036854775808",

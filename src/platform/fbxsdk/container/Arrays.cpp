@@ -73,6 +73,7 @@ bool DecodeBinary(const Binary::VArray& i_rArray, VArrayNumbers<T>& o_rNumbers)
 	{
 	case 'f': return DecodeAs<float>(i_rArray, o_rNumbers);
 	case 'd': return DecodeAs<double>(i_rArray, o_rNumbers);
+	case 'y': return DecodeAs<std::int16_t>(i_rArray, o_rNumbers);
 	case 'i': return DecodeAs<std::int32_t>(i_rArray, o_rNumbers);
 	case 'l': return DecodeAs<std::int64_t>(i_rArray, o_rNumbers);
 	default: return DecodeAs<std::int8_t>(i_rArray, o_rNumbers);

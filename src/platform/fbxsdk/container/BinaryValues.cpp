@@ -8,12 +8,13 @@ namespace
 /// Type, count, encoding, size in the file.
 constexpr std::ptrdiff_t c_ArrayHeaderSize = 13;
 
-std::ptrdiff_t ScalarSize(char i_Type)
+constexpr std::ptrdiff_t ScalarSize(char i_Type)
 {
 	switch (i_Type)
 	{
+	case 'B':
 	case 'C':
-	case 'B': return 1;
+	case 'Z': return 1;
 	case 'Y': return 2;
 	case 'I':
 	case 'F': return 4;
@@ -27,16 +28,8 @@ std::ptrdiff_t ScalarSize(char i_Type)
 
 std::uint32_t FbxFormat::Binary::ArrayItemSize(char i_Type)
 {
-	switch (i_Type)
-	{
-	case 'c':
-	case 'b': return 1;
-	case 'i':
-	case 'f': return 4;
-	case 'l':
-	case 'd': return 8;
-	default: return 0;
-	}
+	// An array has the small letter of its scalars.
+	return i_Type >= 'a' && i_Type <= 'z' ? std::uint32_t(ScalarSize(char(i_Type - 'a' + 'A'))) : 0;
 }
 
 const char* FbxFormat::Binary::SkipValue(const char* i_pFrom, const char* i_pEnd)

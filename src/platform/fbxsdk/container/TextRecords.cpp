@@ -64,7 +64,7 @@ private:
 		VElement element;
 		element.m_Name = std::uint32_t(pName - m_pBegin);
 		element.m_NameLength = std::uint8_t(length);
-		m_p = Text::SkipBlanks(m_p, m_pEnd);
+		m_p = FindValues();
 		if (Is('*'))
 			return ReadArray(element);
 		if (!ReadList(element) || !m_rBuilder.Add(element))
@@ -78,6 +78,18 @@ private:
 		}
 		++m_p;
 		return m_rBuilder.Open(m_pEnd - m_pBegin);
+	}
+
+	/// Behind the colon of a name: the values, which may begin on a later line. The end of this one if there are none.
+	const char* FindValues() const
+	{
+		const char* const pHere = Text::SkipBlanks(m_p, m_pEnd);
+		const char* const pNext = Text::SkipSpace(pHere, m_pEnd);
+		if (pNext == pHere || pNext == m_pEnd || *pNext == '{' || *pNext == '}')
+			return pHere;
+		const char* const pNameEnd = Text::ScanName(pNext, m_pEnd);
+		const char* const pColon = Text::SkipBlanks(pNameEnd, m_pEnd);
+		return pNameEnd != pNext && pColon != m_pEnd && *pColon == ':' ? pHere : pNext;
 	}
 
 	/// "1,2,3", over as many lines as the commas lead to.

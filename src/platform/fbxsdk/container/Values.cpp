@@ -44,7 +44,8 @@ VValue LoadBinary(const char* i_pFrom)
 	switch (*i_pFrom)
 	{
 	case 'B':
-	case 'C': return Integer(Binary::Load<std::int8_t>(p));
+	case 'C':
+	case 'Z': return Integer(Binary::Load<std::int8_t>(p));
 	case 'Y': return Integer(Binary::Load<std::int16_t>(p));
 	case 'I': return Integer(Binary::Load<std::int32_t>(p));
 	case 'L': return Integer(Binary::Load<std::int64_t>(p));
