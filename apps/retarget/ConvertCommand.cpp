@@ -1,4 +1,5 @@
 #include "retarget/Commands.h"
+#include "retarget/OutputFile.h"
 #include "retarget/SubjectFile.h"
 
 #include "CoreOrlexQRTIO/FormatVersions.h"
@@ -7,6 +8,7 @@
 #include "DebugServices/GlobalLog.h"
 
 #include <boost/algorithm/string/join.hpp>
+#include <boost/filesystem/operations.hpp>
 
 namespace CommandLine
 {
@@ -16,14 +18,29 @@ namespace
 struct VConvertSettings
 {
 	std::string m_In;
-	std::string m_Out;
+	VOutput m_Out;
 	std::uint32_t m_Version = CoreOrlexQRTIO::c_AutomaticVersion;
 	std::string m_VersionText = "(automatic)";
 };
 
+/// A performer's skeleton and a retarget subject have one format, but take each other's place by a slip of the hand
+/// only.
+void CheckKind(const VConvertSettings& i_rSettings)
+{
+	const VOutput& rOut = i_rSettings.m_Out;
+	CheckOutput(rOut, c_SkeletonFamilyFile);
+	const std::string extension = LowerExtension(i_rSettings.m_In);
+	boost::system::error_code error;
+	if (!rOut.m_bForce && rOut.m_Path != "-" && boost::filesystem::exists(rOut.m_Path, error)
+	    && LowerExtension(rOut.m_Path) != (extension == c_LegacyExtension ? ".qrr" : extension))
+		throw VCommandError(EBadOutput,
+		    "\"" + rOut.m_Path + "\" is there, and is of another kind than \"" + i_rSettings.m_In
+		        + "\": give another name, or --force to replace it");
+}
+
 EExitStatus Convert(const VConvertSettings& i_rSettings)
 {
-	CheckOutput(i_rSettings.m_Out);
+	CheckKind(i_rSettings);
 	const VSubjectFile file = ReadSubjectFile(i_rSettings.m_In);
 	const CoreOrlexTypes::VSubjectRecord& rRecord = file.m_Record;
 	const auto losses = CoreOrlexQRTIO::ListVersionLosses(
@@ -31,8 +48,8 @@ EExitStatus Convert(const VConvertSettings& i_rSettings)
 	if (!losses.empty())
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "Version %1% of the format cannot hold: %2%", i_rSettings.m_VersionText,
 		    boost::algorithm::join(losses, ", "));
-	WriteSubjectFile(i_rSettings.m_Out, rRecord.m_SubjectParametrised, rRecord.m_SubjectApplicationData, file.m_Extras,
-	    i_rSettings.m_Version);
+	WriteSubjectFile(i_rSettings.m_Out.m_Path, rRecord.m_SubjectParametrised, rRecord.m_SubjectApplicationData,
+	    file.m_Extras, i_rSettings.m_Version);
 	return EFine;
 }
 
@@ -46,9 +63,10 @@ VCommand AddConvertCommand(CLI::App& io_rProgram)
 	    {"convert legacy.qrx hero.qrr", "convert performer.qrs old.qrs --format-version 2.6"});
 	const auto pSettings = std::make_shared<VConvertSettings>();
 	pApp->add_option("IN", pSettings->m_In, "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)")->required();
-	pApp->add_option(
-	        "OUT", pSettings->m_Out, "Where the skeleton file is written; may be IN itself, - is standard output")
+	pApp->add_option("OUT", pSettings->m_Out.m_Path,
+	        "Where the skeleton file is written; may be IN itself, - is standard output")
 	    ->required();
+	AddForceOption(*pApp, pSettings->m_Out);
 	pApp->add_option_function<std::string>(
 	        "--format-version",
 	        [pSettings](const std::string& i_rText)

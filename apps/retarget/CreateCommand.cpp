@@ -1,7 +1,7 @@
 #include "retarget/Commands.h"
 #include "retarget/Edits.h"
+#include "retarget/OutputFile.h"
 #include "retarget/Session.h"
-#include "retarget/SubjectFile.h"
 
 #include "DebugServices/GlobalLog.h"
 
@@ -17,7 +17,7 @@ struct VCreateSettings
 	std::string m_Fbx;
 	std::string m_Source;
 	std::optional<std::string> m_Root;
-	std::string m_Out;
+	VOutput m_Out;
 };
 
 bool MatchesFilePose(const VEdits& i_rEdits)
@@ -28,7 +28,7 @@ bool MatchesFilePose(const VEdits& i_rEdits)
 
 EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 {
-	CheckOutput(i_rSettings.m_Out, {i_rSettings.m_Fbx, i_rSettings.m_Source});
+	CheckOutput(i_rSettings.m_Out, c_RetargetSubjectFile, {i_rSettings.m_Fbx, i_rSettings.m_Source});
 	VSession session;
 	// The target subject takes the source's name when it is made.
 	if (!i_rSettings.m_Source.empty())
@@ -38,7 +38,7 @@ EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 		TellDifferenceFromFile(session, *worst, MatchesFilePose(i_rEdits) ? NVX::ELogInformation : NVX::ELogWarning,
 		    "The bind pose as built", "; --match-file-pose mends it");
 	ApplyEdits(session, i_rEdits);
-	session.Save(i_rSettings.m_Out);
+	session.Save(i_rSettings.m_Out.m_Path);
 	return EFine;
 }
 
@@ -62,9 +62,11 @@ VCommand AddCreateCommand(CLI::App& io_rProgram)
 	pApp->add_option("--root", pSettings->m_Root,
 	        "The bone that becomes the root, by name or by index in the file; the first bone if left out")
 	    ->option_text("NAME|INDEX");
-	pApp->add_option("-o,--output", pSettings->m_Out, "Where the retarget subject is saved; - is standard output")
+	pApp->add_option(
+	        "-o,--output", pSettings->m_Out.m_Path, "Where the retarget subject is saved; - is standard output")
 	    ->option_text("OUT.qrr")
 	    ->required();
+	AddForceOption(*pApp, pSettings->m_Out);
 	AddEditOptions(*pApp, pEdits, true);
 	return {pApp, [pSettings, pEdits] { return Create(*pSettings, *pEdits); }};
 }

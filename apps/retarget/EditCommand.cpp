@@ -1,7 +1,7 @@
 #include "retarget/Commands.h"
 #include "retarget/Edits.h"
+#include "retarget/OutputFile.h"
 #include "retarget/Session.h"
-#include "retarget/SubjectFile.h"
 
 namespace CommandLine
 {
@@ -12,18 +12,18 @@ struct VEditSettings
 {
 	std::string m_In;
 	std::string m_Source;
-	std::string m_Out;
+	VOutput m_Out;
 };
 
 EExitStatus Edit(const VEditSettings& i_rSettings, const VEdits& i_rEdits)
 {
-	CheckOutput(i_rSettings.m_Out, {i_rSettings.m_Source});
+	CheckOutput(i_rSettings.m_Out, c_RetargetSubjectFile, {i_rSettings.m_Source});
 	VSession session;
 	session.LoadTarget(i_rSettings.m_In);
 	if (!i_rSettings.m_Source.empty())
 		session.LoadSource(i_rSettings.m_Source);
 	ApplyEdits(session, i_rEdits);
-	session.Save(i_rSettings.m_Out);
+	session.Save(i_rSettings.m_Out.m_Path);
 	return EFine;
 }
 
@@ -40,10 +40,11 @@ VCommand AddEditCommand(CLI::App& io_rProgram)
 	pApp->add_option("IN.qrr", pSettings->m_In, "The retarget subject, or a legacy one (.qrx)")->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton; adding and updating targets needs it")
 	    ->option_text("FILE.qrs");
-	pApp->add_option("-o,--output", pSettings->m_Out,
+	pApp->add_option("-o,--output", pSettings->m_Out.m_Path,
 	        "Where the retarget subject is saved; may be IN.qrr itself, - is standard output")
 	    ->option_text("OUT.qrr")
 	    ->required();
+	AddForceOption(*pApp, pSettings->m_Out);
 	AddEditOptions(*pApp, pEdits, false);
 	return {pApp, [pSettings, pEdits] { return Edit(*pSettings, *pEdits); }};
 }

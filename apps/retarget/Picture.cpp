@@ -141,7 +141,7 @@ EExitStatus RenderPicture(const VRenderSettings& i_rSettings)
 		throw VCommandError(EBadOutput,
 		    "This display (" + QGuiApplication::platformName().toStdString()
 		        + ") has no OpenGL to draw with: try LIBGL_ALWAYS_SOFTWARE=1, or run the command with \"xvfb-run -a\"");
-	Save(Draw(session, i_rSettings), i_rSettings.m_Out);
+	Save(Draw(session, i_rSettings), i_rSettings.m_Out.m_Path);
 	return EFine;
 }
 

@@ -1,10 +1,6 @@
 #include "retarget/RenderCommand.h"
 
 #include "retarget/Commands.h"
-#include "retarget/SubjectFile.h"
-
-#include <boost/algorithm/string/case_conv.hpp>
-#include <boost/filesystem/path.hpp>
 
 #include <charconv>
 
@@ -33,12 +29,7 @@ bool ParseSize(const std::string& i_rText, VRenderSettings& o_rSettings)
 
 EExitStatus Render(const VRenderSettings& i_rSettings, const VRender& i_rRender)
 {
-	const std::string extension =
-	    boost::algorithm::to_lower_copy(boost::filesystem::path(i_rSettings.m_Out).extension().string());
-	if (i_rSettings.m_Out != "-" && extension != ".png")
-		throw VCommandError(
-		    EWrongUsage, "\"" + i_rSettings.m_Out + "\": the picture is written as PNG; let its name end in .png");
-	CheckOutput(i_rSettings.m_Out, {i_rSettings.m_In, i_rSettings.m_Source});
+	CheckOutput(i_rSettings.m_Out, c_PictureFile, {i_rSettings.m_In, i_rSettings.m_Source});
 	return i_rRender(i_rSettings);
 }
 
@@ -76,9 +67,10 @@ VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender)
 	        },
 	        "Pixels of the picture (default: 1280x720)")
 	    ->option_text("WxH");
-	pApp->add_option("-o,--output", pSettings->m_Out, "Where the picture is saved; - is standard output")
+	pApp->add_option("-o,--output", pSettings->m_Out.m_Path, "Where the picture is saved; - is standard output")
 	    ->option_text("OUT.png")
 	    ->required();
+	AddForceOption(*pApp, pSettings->m_Out);
 	return {pApp, [pSettings, i_rRender] { return Render(*pSettings, i_rRender); }};
 }
 

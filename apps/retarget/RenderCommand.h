@@ -1,6 +1,7 @@
 #pragma once
 
 #include "retarget/ExitStatus.h"
+#include "retarget/OutputFile.h"
 
 #include <array>
 #include <cstdint>
@@ -18,8 +19,7 @@ struct VRenderSettings
 	std::string m_Source;
 	/// Folder; empty for none.
 	std::string m_Skins;
-	/// "-" for standard output.
-	std::string m_Out;
+	VOutput m_Out;
 	std::string m_View;
 	int m_Width = 1280;
 	int m_Height = 720;

@@ -1,5 +1,6 @@
 #include "retarget/Commands.h"
 #include "retarget/Output.h"
+#include "retarget/OutputFile.h"
 
 #include "CoreOrlexQRTIO/Reader.h"
 
@@ -8,13 +9,14 @@ namespace CommandLine
 namespace
 {
 
-EExitStatus ShowSchema(const std::string& i_rOut)
+EExitStatus ShowSchema(const VOutput& i_rOut)
 {
+	CheckOutput(i_rOut, c_SchemaFile);
 	CoreOrlexQRTIO::VReader reader;
-	if (i_rOut == "-")
+	if (i_rOut.m_Path == "-")
 		Print(reader.SchemaText());
-	else if (!reader.WriteSchema(i_rOut))
-		throw VCommandError(EBadOutput, "\"" + i_rOut + "\" could not be written");
+	else if (!reader.WriteSchema(i_rOut.m_Path))
+		throw VCommandError(EBadOutput, "\"" + i_rOut.m_Path + "\" could not be written");
 	return EFine;
 }
 
@@ -24,9 +26,10 @@ VCommand AddSchemaCommand(CLI::App& io_rProgram)
 {
 	CLI::App* const pApp = AddCommand(io_rProgram, "schema", "Print the XML schema of the skeleton file format",
 	    {"schema > skeleton.xsd", "schema -o skeleton.xsd && xmllint --noout --schema skeleton.xsd hero.qrr"});
-	const auto pOut = std::make_shared<std::string>("-");
-	pApp->add_option("-o,--output", *pOut, "Where the schema is written; - is standard output (the default)")
+	const auto pOut = std::make_shared<VOutput>(VOutput{"-"});
+	pApp->add_option("-o,--output", pOut->m_Path, "Where the schema is written; - is standard output (the default)")
 	    ->option_text("FILE");
+	AddForceOption(*pApp, *pOut);
 	return {pApp, [pOut] { return ShowSchema(*pOut); }};
 }
 

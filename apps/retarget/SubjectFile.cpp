@@ -12,16 +12,10 @@
 #include "RetargetSetupDocument/FilePath.h"
 #include "RetargetSetupDocument/Identity.h"
 
-#include <boost/filesystem/operations.hpp>
+#include <vector>
 
 namespace CommandLine
 {
-namespace
-{
-
-constexpr const char* c_LegacyExtension = ".qrx";
-
-} // namespace
 
 bool TryReadSubjectFile(const std::string& i_rPath, VSubjectFile& o_rFile)
 {
@@ -45,19 +39,6 @@ VSubjectFile ReadSubjectFile(const std::string& i_rPath)
 	if (!TryReadSubjectFile(i_rPath, file))
 		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a skeleton file");
 	return file;
-}
-
-void CheckOutput(const std::string& i_rPath, const std::vector<std::string>& i_rInputs)
-{
-	if (RetargetSetup::FileExtension(i_rPath) == c_LegacyExtension)
-		throw VCommandError(
-		    EWrongUsage, "\"" + i_rPath + "\": .qrx is the legacy text form, which is only read; save as .qrr");
-	for (const std::string& rInput : i_rInputs)
-	{
-		boost::system::error_code error;
-		if (boost::filesystem::equivalent(i_rPath, rInput, error) && !error)
-			throw VCommandError(EWrongUsage, "\"" + i_rPath + "\" is an input that saving there would destroy");
-	}
 }
 
 void WriteSubjectFile(const std::string& i_rPath, const CoreOrlexTypes::VSubjectParametrised& i_rSubject,

@@ -4,10 +4,12 @@
 #include "CoreOrlexTypes/SubjectRecord.h"
 
 #include <string>
-#include <vector>
 
 namespace CommandLine
 {
+
+/// Of the legacy text form, which is only read.
+inline constexpr const char* c_LegacyExtension = ".qrx";
 
 /// What a file of the skeleton family holds.
 struct VSubjectFile
@@ -23,10 +25,6 @@ bool TryReadSubjectFile(const std::string& i_rPath, VSubjectFile& o_rFile);
 /// Reads a skeleton file as it stands, or a legacy text file (.qrx) as the document takes it in. Throws VCommandError
 /// with EBadInput if that fails.
 VSubjectFile ReadSubjectFile(const std::string& i_rPath);
-
-/// Refuses, with EWrongUsage, an output that would replace one of these inputs by a file of another kind, and one whose
-/// extension would make it be read as legacy text.
-void CheckOutput(const std::string& i_rPath, const std::vector<std::string>& i_rInputs = {});
 
 /// Writes a skeleton file at a version of the format, to standard output if the path is "-". Throws VCommandError with
 /// EBadOutput if that fails; a file that stood there then stays.

@@ -15,6 +15,14 @@ std::vector<std::string> VScratchFolder::Names() const
 	return names;
 }
 
+std::map<std::string, std::string> VScratchFolder::Snapshot() const
+{
+	std::map<std::string, std::string> files;
+	for (const std::string& rName : Names())
+		files[rName] = Read(rName);
+	return files;
+}
+
 VRun VScratchFolder::Run(const std::vector<std::string>& i_rArguments) const
 {
 	// Files take any amount of output without a reader.

@@ -2,6 +2,7 @@
 
 #include "../UtilsFileSystem/Folder.h"
 
+#include <map>
 #include <vector>
 
 /// What one run of the program left behind.
@@ -23,4 +24,6 @@ public:
 	std::string Read(const std::string& i_rName) const { return Get(*this / i_rName); }
 	/// Names of all that lies in it, in order.
 	std::vector<std::string> Names() const;
+	/// The same with what each file holds.
+	std::map<std::string, std::string> Snapshot() const;
 };

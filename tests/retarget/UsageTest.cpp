@@ -46,7 +46,6 @@ TEST(Usage, WrongWords)
 	        "--size: \"64x9\" is not WIDTHxHEIGHT with 16 to 4096 pixels each"},
 	    {"size in words", {"render", "x.qrr", "-o", "x.png", "--size", "64x64x"}, 2, "", "is not WIDTHxHEIGHT"},
 	    {"view", {"render", "x.qrr", "-o", "x.png", "--view", "side"}, 2, "", "side not in {perspective,front,"},
-	    {"no picture", {"render", "x.qrr", "-o", "x.jpg"}, 2, "", "\"x.jpg\": the picture is written as PNG"},
 	    {"state", {"fk", c_Performer, "--state", "1,2"}, 2, "", "take 67 numbers, not 2"},
 	});
 }
@@ -55,19 +54,50 @@ TEST(Usage, OutputsThatWouldDestroy)
 {
 	const VScratchFolder folder;
 	folder.Write("hero.fbx", Get(c_Fbx));
-	folder.Write("performer.qrs", Get(c_Performer));
+	for (const char* pName : {"performer.qrs", "other.qrs", "hero.qrr", "subject.xsd", "subject.png"})
+		folder.Write(pName, Get(c_Performer));
+	for (const char* pName : {"other.fbx", "fbx.qrr"})
+		folder.Write(pName, "Kaydara FBX Binary  ");
+	folder.Write("empty.xsd", "");
+	folder.Write("COMMENTED.QRR", "\xEF\xBB\xBF<?xml version=\"1.0\"?>\n<!-- <Skeleton> -->\n<KinematicModel/>");
+	const auto before = folder.Snapshot();
 	RunRows(
 	    {
 	        {"the character", {"create", "--fbx", "hero.fbx", "-o", "./hero.fbx"}, 2, "",
 	            "\"./hero.fbx\" is an input that saving there would destroy"},
 	        {"the performer", {"create", "--fbx", "hero.fbx", "--source", "performer.qrs", "-o", "performer.qrs"}, 2,
 	            "", "\"performer.qrs\" is an input"},
-	        {"legacy name", {"create", "--fbx", "hero.fbx", "-o", "hero.qrx"}, 2, "",
-	            "\"hero.qrx\": .qrx is the legacy text form, which is only read; save as .qrr"},
-	        {"legacy name", {"convert", "performer.qrs", "x.qrx"}, 2, "", "save as .qrr"},
+	        {"another character", {"create", "--fbx", "hero.fbx", "-o", "other.fbx"}, 2, "",
+	            "error retarget: \"other.fbx\": what is written is a retarget subject; let the name of its file end in "
+	            ".qrr\n"},
+	        {"another performer", {"edit", "hero.qrr", "-o", "other.qrs", "--force"}, 2, "", "file end in .qrr"},
+	        {"no extension", {"edit", "hero.qrr", "-o", ".qrr/hero"}, 2, "", "file end in .qrr"},
+	        {"legacy name", {"convert", "performer.qrs", "x.qrx"}, 2, "", "file end in .qrt, .qrk, .qrs or .qrr"},
+	        {"a character by convert", {"convert", "performer.qrs", "hero.fbx"}, 2, "", "file end in .qrt"},
+	        {"a subject by its schema", {"schema", "-o", "hero.qrr"}, 2, "", "an XML schema; let the name of its file"},
+	        {"a picture", {"render", "hero.qrr", "-o", "x.jpg"}, 2, "", "\"x.jpg\": what is written is a PNG picture"},
+	        {"misnamed, create", {"create", "--fbx", "hero.fbx", "-o", "fbx.qrr"}, 4, "",
+	            "error retarget: \"fbx.qrr\" is there, and is not a retarget subject: give another name, or --force to "
+	            "replace it\n"},
+	        {"misnamed, edit", {"edit", "hero.qrr", "-o", "fbx.qrr"}, 4, "", "is not a retarget subject"},
+	        {"misnamed, schema", {"schema", "-o", "subject.xsd"}, 4, "", "is not an XML schema"},
+	        {"misnamed, render", {"render", "hero.qrr", "-o", "subject.png"}, 4, "", "is not a PNG picture"},
+	        {"misnamed, convert", {"convert", "performer.qrs", "fbx.qrr"}, 4, "", "is not a skeleton file"},
+	        {"another kind", {"convert", "performer.qrs", "hero.qrr"}, 4, "",
+	            "\"hero.qrr\" is there, and is of another kind than \"performer.qrs\""},
 	    },
 	    folder);
-	EXPECT_TRUE(folder.Read("hero.fbx") == Get(c_Fbx));
+	EXPECT_EQ(folder.Snapshot(), before);
+	for (const std::vector<std::string>& rArguments : std::vector<std::vector<std::string>>{
+	         {"schema", "-o", "empty.xsd"},
+	         {"schema", "-o", "subject.xsd", "--force"},
+	         {"schema", "-o", "subject.xsd"},
+	         {"convert", "performer.qrs", "hero.qrr", "--force"},
+	         {"create", "--fbx", "hero.fbx", "-o", "fbx.qrr", "--force"},
+	         {"create", "--fbx", "hero.fbx", "-o", "COMMENTED.QRR"},
+	     })
+		EXPECT_EQ(folder.Run(rArguments).m_Status, 0) << rArguments[2];
+	EXPECT_EQ(folder.Read("fbx.qrr"), folder.Read("COMMENTED.QRR"));
 }
 
 TEST(Usage, EditsThatNameWhatIsNotThere)
