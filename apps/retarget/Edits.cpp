@@ -7,6 +7,7 @@
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/FilePose.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
+#include "RetargetSetupDocument/SideOfName.h"
 #include "math/NumberText.h"
 
 #include <algorithm>
@@ -18,15 +19,51 @@ namespace
 
 using CoreOrlexTypes::VSubjectParametrised;
 
+/// The index of the segment on the other side, -1 if there is none.
+std::int32_t PartnerOf(
+    const VSession::VPartners& i_rPartners, const VSubjectParametrised& i_rSubject, std::size_t i_Segment)
+{
+	for (auto it = i_rPartners.rbegin(); it != i_rPartners.rend(); ++it)
+		if (it->first == i_Segment || it->second == i_Segment)
+			return std::int32_t(it->first == i_Segment ? it->second : it->first);
+	return RetargetSetup::FindMirrorSegment(i_rSubject, i_Segment);
+}
+
+void AddOneTarget(
+    VSession& io_rSession, const std::string& i_rEdit, std::size_t i_Source, std::size_t i_Target, bool i_bPosition)
+{
+	const std::size_t before = io_rSession.Target().m_Targets.size();
+	io_rSession.Document().AddTarget(int(i_Source), int(i_Target), i_bPosition, false);
+	if (io_rSession.Target().m_Targets.size() == before)
+		throw VCommandError(EBadInput, i_rEdit + ": the target could not be added");
+}
+
 void AddTarget(VSession& io_rSession, const std::string& i_rPair, bool i_bPosition)
 {
 	const std::string option = i_bPosition ? "--position" : "--rotation";
-	const auto [source, target] = FindPair(i_rPair, SegmentsOf(io_rSession.Source(option), "source segment"),
-	    SegmentsOf(io_rSession.Target(), "target segment"));
-	const std::size_t before = io_rSession.Target().m_Targets.size();
-	io_rSession.Document().AddTarget(int(source), int(target), i_bPosition, io_rSession.m_bSymmetry);
-	if (io_rSession.Target().m_Targets.size() == before)
-		throw VCommandError(EBadInput, option + " " + i_rPair + ": the target could not be added");
+	const VSubjectParametrised& rSource = io_rSession.Source(option);
+	const auto [source, target] =
+	    FindPair(i_rPair, SegmentsOf(rSource, "source segment"), SegmentsOf(io_rSession.Target(), "target segment"));
+	const std::string edit = option + " " + i_rPair;
+	AddOneTarget(io_rSession, edit, source, target, i_bPosition);
+	if (!io_rSession.m_bSymmetry)
+		return;
+	const std::string& rSourceName = rSource.m_Segments[source].m_Name;
+	const std::string& rTargetName = io_rSession.Target().m_Segments[target].m_Name;
+	const std::int32_t sourcePartner = PartnerOf(io_rSession.m_SourcePartners, rSource, source);
+	const std::int32_t targetPartner = PartnerOf(io_rSession.m_TargetPartners, io_rSession.Target(), target);
+	if (sourcePartner != -1 && targetPartner != -1)
+		return AddOneTarget(io_rSession, edit, std::size_t(sourcePartner), std::size_t(targetPartner), i_bPosition);
+	const auto hasSide = [](const std::string& i_rName)
+	{ return RetargetSetup::SideOfName(i_rName) != RetargetSetup::ESide::None; };
+	const std::string sentence = edit + ": " + (sourcePartner == -1 ? "the source segment \"" + rSourceName + "\"" : "")
+	    + (sourcePartner == -1 && targetPartner == -1 ? " and " : "")
+	    + (targetPartner == -1 ? "the target segment \"" + rTargetName + "\"" : "")
+	    + " has no partner on the other side";
+	if (hasSide(rSourceName) && hasSide(rTargetName))
+		io_rSession.m_WithoutPartner.push_back(sentence);
+	else
+		NVX_LOG(c_pCategory, NVX::ELogInformation, "%1%: the target is added alone", sentence);
 }
 
 void AddPosition(VSession& io_rSession, const std::string& i_rPair)
@@ -47,6 +84,45 @@ void SymmetryOn(VSession& io_rSession, const std::string&)
 void SymmetryOff(VSession& io_rSession, const std::string&)
 {
 	io_rSession.m_bSymmetry = false;
+}
+
+void Pair(VSession& io_rSession, const std::string& i_rPair)
+{
+	if (i_rPair.starts_with('#') || i_rPair.find(":#") != std::string::npos)
+		throw VCommandError(EWrongUsage,
+		    "--pair " + i_rPair + ": segments are given by name, since an index means one of each skeleton");
+	const auto add = [&](const VSubjectParametrised& i_rSubject, const char* i_pKind, VSession::VPartners& io_rPartners)
+	{
+		const VElements segments = SegmentsOf(i_rSubject, i_pKind);
+		io_rPartners.push_back(FindPair(i_rPair, segments, segments));
+	};
+	bool bOfSource = false;
+	if (const auto pSource = io_rSession.Document().SourceValues().m_pParametrised)
+	{
+		try
+		{
+			add(*pSource, "source segment", io_rSession.m_SourcePartners);
+			bOfSource = true;
+		}
+		catch (const VCommandError&)
+		{
+			// Then they are the target's, or it tells what is wrong.
+		}
+	}
+	try
+	{
+		add(io_rSession.Target(), "target segment", io_rSession.m_TargetPartners);
+	}
+	catch (const VCommandError&)
+	{
+		if (!bOfSource)
+			throw;
+	}
+}
+
+void AllowPartial(VSession& io_rSession, const std::string&)
+{
+	io_rSession.m_bAllowPartial = true;
 }
 
 void RemoveTarget(VSession& io_rSession, const std::string& i_rIndex)
@@ -159,6 +235,15 @@ constexpr VEditKind c_Kinds[] = {
         "Add a rotation target: the orientation of the target segment TGT follows the source segment SRC", AddRotation},
     {"--symmetry", nullptr, "From here on, a target that is added gets its left or right partner too", SymmetryOn},
     {"--no-symmetry", nullptr, "From here on, a target is added alone (the default)", SymmetryOff},
+    {"--pair", "LEFT:RIGHT",
+        "From here on, the segments LEFT and RIGHT are each other's partner, whatever their names say: of the source, "
+        "of "
+        "the target, or of both where both have them",
+        Pair},
+    {"--allow-partial", nullptr,
+        "Let a target of one side, wherever it stands, go without a partner where none is found; without this it is an "
+        "error (exit status 1)",
+        AllowPartial},
     {"--remove-target", "N", "Remove target N; those behind it move up by one", RemoveTarget},
     {"--weight", "N=W", "Give target N the weight W", SetWeight},
     {"--state", "N=X,Y,Z",
@@ -213,6 +298,15 @@ void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
 		rEdit.m_pKind->m_pApply(io_rSession, rEdit.m_Value);
 		io_rSession.Settle();
 	}
+	const std::vector<std::string>& rWithoutPartner = io_rSession.m_WithoutPartner;
+	const bool bPartial = io_rSession.m_bAllowPartial;
+	for (const std::string& rSentence : rWithoutPartner)
+		NVX_LOG(c_pCategory, bPartial ? NVX::ELogWarning : NVX::ELogError, "%1%", rSentence);
+	if (!rWithoutPartner.empty() && !bPartial)
+		throw VCommandError(EFindings,
+		    "--symmetry found no partner for " + std::to_string(rWithoutPartner.size())
+		        + " of the targets: give it with --pair LEFT:RIGHT, add those with --no-symmetry, or go without with "
+		          "--allow-partial");
 }
 
 } // namespace CommandLine

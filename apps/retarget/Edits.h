@@ -35,7 +35,8 @@ using VEdits = std::vector<VEdit>;
 /// Adds the options of all edits to a command; parsing appends to the list.
 void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits, bool i_bOfCreate);
 
-/// Runs them in order, with the document's callbacks after each.
+/// Runs them in order, with the document's callbacks after each. Throws VCommandError with EFindings if --symmetry
+/// found no partner for a target of one side.
 void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits);
 
 } // namespace CommandLine

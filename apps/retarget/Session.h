@@ -14,6 +14,8 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <utility>
+#include <vector>
 
 namespace CommandLine
 {
@@ -62,6 +64,13 @@ public:
 
 	/// Whether targets that are added get a mirrored partner; off at first, as in the panel.
 	bool m_bSymmetry = false;
+	/// Segments that are each other's partner whatever their names say, by index; the last one counts.
+	using VPartners = std::vector<std::pair<std::size_t, std::size_t>>;
+	VPartners m_SourcePartners;
+	VPartners m_TargetPartners;
+	/// One sentence for each target of a side that should have got a partner and did not.
+	std::vector<std::string> m_WithoutPartner;
+	bool m_bAllowPartial = false;
 	/// The bind poses have been taken from the file.
 	bool m_bMatched = false;
 

@@ -5,6 +5,8 @@
 namespace
 {
 
+using VNames = std::vector<std::string>;
+
 /// Creates x.qrr with these edits.
 class Edit : public testing::Test
 {
@@ -32,8 +34,6 @@ protected:
 	VScratchFolder m_Folder;
 };
 
-using VNames = std::vector<std::string>;
-
 TEST_F(Edit, RunInTheOrderOfTheLine)
 {
 	Create({"--rotation", "LeftArm:LeftArm", "--symmetry", "--position", "LeftFoot:LeftFoot", "--no-symmetry",
@@ -54,6 +54,40 @@ TEST_F(Edit, RunInTheOrderOfTheLine)
 	EXPECT_EQ(
 	    Targets()[0].at("state"), VJson({"0.000000*GlobalScale", "10.000000*GlobalScale", "0.000021*GlobalScale"}));
 	EXPECT_NEAR(Targets()[0].at("distance"), 0.0, 1e-5);
+}
+
+TEST_F(Edit, SymmetryNeedsAPartner)
+{
+	const std::string arnaud = Data("fbx/pab_arnaud_b7500.fbx");
+	const std::vector<std::string> common{"--match-file-pose", "--symmetry", "--rotation", "LeftHand:Lefthand",
+	    "--position", "LeftFoot:LeftFoot", "--position", "LeftArm:LeftHandRingPinky1"};
+	const auto with = [&](std::vector<std::string> i_Options)
+	{
+		i_Options.insert(i_Options.end(), common.begin(), common.end());
+		return i_Options;
+	};
+	std::vector<std::string> line{"create", "--fbx", arnaud, "--source", c_Performer, "-o", "x.qrr"};
+	line.insert(line.end(), common.begin(), common.end());
+	RunRows(
+	    {{"no partner", line, 1, "",
+	        "error retarget: --rotation LeftHand:Lefthand: the target segment \"Lefthand\" has no partner on the other "
+	        "side\nerror retarget: --position LeftArm:LeftHandRingPinky1: the target segment \"LeftHandRingPinky1\" "
+	        "has "
+	        "no partner on the other side\nerror retarget: --symmetry found no partner for 2 of the targets: "}},
+	    m_Folder);
+	Create(with({"--pair", "Lefthand:RightHand", "--pair", "RightHandPinky1:LeftHandRingPinky1"}), arnaud);
+	const VNames all{"LeftHand}Lefthand", "RightHand}RightHand", "LeftFoot>LeftFoot", "RightFoot>RightFoot",
+	    "LeftArm>LeftHandRingPinky1", "RightArm>RightHandPinky1"};
+	EXPECT_EQ(Names(), all);
+	EXPECT_NE(Create(with({"--allow-partial"}), arnaud).m_Err.find("warning retarget: --rotation LeftHand:Lefthand: "),
+	    std::string::npos);
+	EXPECT_EQ(Names(), (VNames{all[0], all[2], all[3], all[4]}));
+	RunRows({
+	    {"pair by index", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--pair", "#1:#2"}, 2, "",
+	        "--pair #1:#2: segments are given by name"},
+	    {"pair of nothing", {"create", "--fbx", c_Fbx, "-o", "x.qrr", "--pair", "LeftArm:RigthArm"}, 2, "",
+	        "there is no target segment \"RigthArm\"; did you mean \"RightArm\""},
+	});
 }
 
 TEST_F(Edit, StatesAreTakenAtThePresentScale)
@@ -114,8 +148,7 @@ TEST_F(Edit, PruningAndCreatingJoints)
 
 TEST_F(Edit, WhatSurprisesIsTold)
 {
-	EXPECT_NE(Create({"--symmetry", "--rotation", "Spine:Spine"}).m_Err.find("has no partner on the other side"),
-	    std::string::npos);
+	EXPECT_EQ(Create({"--symmetry", "--rotation", "Spine:Spine", "--rotation", "Head:LeftArm"}).m_Err, "");
 	EXPECT_NE(Create({"--match-file-pose", "--prune-joints"}).m_Err.find("pruning moves what was matched"),
 	    std::string::npos);
 	const std::string arnaud = Data("fbx/pab_arnaud_b7500.fbx");

@@ -4,6 +4,8 @@
 #include "retarget/Output.h"
 #include "retarget/Suggest.h"
 
+#include "RetargetSetupDocument/SideOfName.h"
+
 #include <gtest/gtest.h>
 
 #include <limits>
@@ -43,6 +45,16 @@ TEST(Suggest, NamesTheClosestFirst)
 	EXPECT_EQ(Closest("Character1:Hips", names, 1), (std::vector<std::string>{"Hips"}));
 	EXPECT_EQ(DidYouMean("hed", {"Head", "Hips"}), "; did you mean \"Head\" or \"Hips\"?");
 	EXPECT_EQ(DidYouMean("hed", {}), "");
+}
+
+TEST(Side, StandsInAWordOfItsOwn)
+{
+	using enum RetargetSetup::ESide;
+	for (const auto& [pName, side] : {std::pair{"LeftArm", Left}, {"upperArmRight", Right}, {"RThumb", Right},
+	         {"lThigh", Left}, {"thumb_01_l", Left}, {"Bip01 L UpperArm", Left}, {"Character1_RightArm", Right},
+	         {"Lefthand", Left}, {"RIGHT_ARM", Right}, {"toe.R.001", Right}, {"Left:Spine", None}, {"Spine", None},
+	         {"collar", None}, {"bright", None}, {"LR", None}, {"LeftRightMid", None}, {"", None}})
+		EXPECT_EQ(RetargetSetup::SideOfName(pName), side) << pName;
 }
 
 TEST(Elements, FindsByNameAndIndex)
