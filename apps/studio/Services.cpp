@@ -10,8 +10,8 @@ namespace StudioHost
 {
 
 VPluginContext::VPluginContext(QSettings& i_rSettings, std::shared_ptr<VQtDispatcher> i_pDispatcher)
-    : m_pDispatcher(std::move(i_pDispatcher)),
-      m_pStore(std::make_shared<TesselDataStore::VDataStore>()), m_StoreFile(i_rSettings, m_pStore, m_pDispatcher),
+    : m_pDispatcher(std::move(i_pDispatcher)), m_pStore(std::make_shared<TesselDataStore::VDataStore>()),
+      m_StoreFile(i_rSettings, m_pStore, m_pDispatcher),
       m_pPreferences(std::make_shared<VPreferences>(m_pStore, m_pDispatcher)),
       m_pApplication(std::make_shared<VApplicationObject>(m_pPreferences)),
       m_pRegistry(std::make_shared<InMemoryHost::VParameterRegistry>()),

@@ -72,8 +72,9 @@ TEST(Records, AreTheSameInEveryForm)
 TEST(Records, BinaryHasValuesOfEveryType)
 {
 	const VTestRecord record{"R",
-	    {VRaw{Bytes('C', '\1')}, VRaw{Bytes('B', '\xff')}, VRaw{Bytes('Z', '\2')}, VRaw{Bytes('Y', std::int16_t(-2))}, VRaw{Bytes('I', -70000)},
-	        VRaw{Bytes('F', 0.5f)}, VRaw{Bytes('R', 2u, "\0x"s)}, VRaw{Bytes('i', 1u, 0u, 4u, 5)}},
+	    {VRaw{Bytes('C', '\1')}, VRaw{Bytes('B', '\xff')}, VRaw{Bytes('Z', '\2')}, VRaw{Bytes('Y', std::int16_t(-2))},
+	        VRaw{Bytes('I', -70000)}, VRaw{Bytes('F', 0.5f)}, VRaw{Bytes('R', 2u, "\0x"s)},
+	        VRaw{Bytes('i', 1u, 0u, 4u, 5)}},
 	    {}};
 	for (const VTestForm& rForm : {c_Forms[1], c_Forms[2]})
 		EXPECT_EQ(Read(Write(rForm, {record})), "R(1,-1,2,-2,-70000,0.5,'\0x',[])"s);

@@ -15,8 +15,7 @@ void VParameterRegistry::Register(const std::string& i_rPath, const std::shared_
 	m_RegisteredSignal.Fire(i_rPath, i_rpGroup->GetName());
 }
 
-std::shared_ptr<IParameterGroup> VParameterRegistry::Find(
-    const std::string& i_rPath, const std::string& i_rName) const
+std::shared_ptr<IParameterGroup> VParameterRegistry::Find(const std::string& i_rPath, const std::string& i_rName) const
 {
 	const auto found = m_Groups.find({i_rPath, i_rName});
 	return found == m_Groups.end() ? nullptr : found->second.lock();

@@ -11,8 +11,8 @@ namespace InMemoryHost
 class VParameterRegistry : public TesselPluginInterface::IParameterRegistry
 {
 public:
-	void Register(const std::string& i_rPath,
-	    const std::shared_ptr<TesselPluginInterface::IParameterGroup>& i_rpGroup) override;
+	void Register(
+	    const std::string& i_rPath, const std::shared_ptr<TesselPluginInterface::IParameterGroup>& i_rpGroup) override;
 	std::shared_ptr<TesselPluginInterface::IParameterGroup> Find(
 	    const std::string& i_rPath, const std::string& i_rName) const override;
 	NVX::VSignal<std::string, std::string>& RegisteredSignal() override { return m_RegisteredSignal; }

@@ -52,8 +52,8 @@ struct VSubjectParametrised
 		bool m_Visible = false;
 	};
 
-	/// A statistic is either empty or has the size that the joint type prescribes (see JointType.h). The rotation's part
-	/// of a ball or free joint's covariance is that of the angle-axis vector from the mean to the state, about the
+	/// A statistic is either empty or has the size that the joint type prescribes (see JointType.h). The rotation's
+	/// part of a ball or free joint's covariance is that of the angle-axis vector from the mean to the state, about the
 	/// joint's axes at the mean.
 	struct VJoint
 	{

@@ -29,8 +29,8 @@ public:
 	/// Asked each time that it matters, so that a preference may change it.
 	virtual VHostRules Rules() const = 0;
 
-	/// Called before a command replaces a target subject that has changes which are not saved. May show a dialog, run an
-	/// event loop and save.
+	/// Called before a command replaces a target subject that has changes which are not saved. May show a dialog, run
+	/// an event loop and save.
 	/// @param i_rAction what the operator wants to do, as the beginning of a sentence: "Create Target Subject".
 	/// @return false: the command ends with no change.
 	virtual bool MayReplaceTargetSubject(const std::string& i_rAction) = 0;

@@ -10,8 +10,8 @@
 namespace TesselPluginInterface
 {
 
-/// Key of the number that says which state of the Alt key makes the mouse select, the other one moves the camera: 1 held,
-/// 0 not held. 1 unless the user has chosen otherwise.
+/// Key of the number that says which state of the Alt key makes the mouse select, the other one moves the camera: 1
+/// held, 0 not held. 1 unless the user has chosen otherwise.
 inline constexpr const char* c_NavigationAltKey = "NavigationAlt";
 
 /// The folders that the user has set in the host, by store key (c_FolderKeys), and the few other preferences that
