@@ -2,13 +2,11 @@
 #include "retarget/Elements.h"
 #include "retarget/Output.h"
 #include "retarget/SubjectFile.h"
-#include "retarget/TargetKinematics.h"
 
-#include "ComputeSubjectFK/ComputeSubjectFK.h"
-#include "ComputeSubjectFK/TargetFKInterfaces.h"
+#include "ComputeSubjectFK/SegmentFKInterfaces.h"
 #include "CoreOrlexTypesUtils/PoseVector.h"
+#include "CoreOrlexTypesUtils/SubjectKinematics.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
-#include "CoreOrlexTypesUtils/UnusedObservations.h"
 #include "DebugServices/GlobalLog.h"
 
 #include <algorithm>
@@ -18,11 +16,10 @@ namespace CommandLine
 namespace
 {
 
-using ComputeSubject::VComputeSubjectFK;
 using CoreOrlexTypes::VSubject;
-using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
-using CoreOrlexTypesUtils::VRenumbering;
+using CoreOrlexTypes::VSubjectRecord;
+namespace SubjectParametrisedConverter = CoreOrlexTypesUtils::SubjectParametrisedConverter;
 
 struct VFkSettings
 {
@@ -31,22 +28,31 @@ struct VFkSettings
 	std::string m_State;
 };
 
-/// Leaves out the targets without kinematics, which is told.
-void DropUnusable(const ComputeSubject::VSegmentTree& i_rTree, const VSubjectApplicationData& i_rApplicationData,
-    std::vector<VSubject::VTarget>& io_rTargets)
+/// The subject in numbers, with kinematics; what has none is told and left out.
+CoreOrlexTypesUtils::VSubjectKinematics MakeKinematics(const std::string& i_rFile, const VSubjectRecord& i_rRecord)
 {
-	std::vector<bool> keep(io_rTargets.size(), true);
-	for (std::size_t i = 0; i < keep.size(); ++i)
+	VSubject subject;
+	const auto failures = SubjectParametrisedConverter::ConvertAllOfSubject(i_rRecord.m_SubjectParametrised, subject);
+	const auto leaveOut = [&](std::size_t i_Index, const std::string& i_rReason)
 	{
-		keep[i] = TargetKinematics(io_rTargets[i], i_rTree) != nullptr;
-		if (keep[i])
-			continue;
-		const auto& rNamed = i_rApplicationData.m_Targets;
-		NVX_LOG(c_pCategory, NVX::ELogWarning,
-		    "Target #%1% \"%2%\" does not fit its type, or has one without kinematics: it is left out", i,
-		    i < rNamed.size() ? rNamed[i].m_Name : std::string());
+		const auto& rNamed = i_rRecord.m_SubjectApplicationData.m_Targets;
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "Target #%1% \"%2%\" is left out: %3%", i_Index,
+		    i_Index < rNamed.size() ? rNamed[i_Index].m_Name : std::string(), i_rReason);
+	};
+	for (const auto& rFailure : failures)
+	{
+		leaveOut(rFailure.m_Index, "its state does not evaluate: " + rFailure.m_Reason);
+		subject.m_Targets[rFailure.m_Index].m_Type = VSubject::VTarget::EBadTargetType;
 	}
-	CoreOrlexTypesUtils::VRenumbering(keep).Close(io_rTargets);
+	CoreOrlexTypesUtils::VSubjectKinematics kinematics(subject);
+	if (!kinematics.IsBuilt())
+		throw VCommandError(
+		    EBadInput, "\"" + i_rFile + "\" has segments that make no tree, or more than one: they have no kinematics");
+	for (std::size_t i = 0; i < subject.m_Targets.size(); ++i)
+		if (!kinematics.Target(i)
+		    && std::ranges::find(failures, i, &SubjectParametrisedConverter::VTargetFailure::m_Index) == failures.end())
+			leaveOut(i, "it does not fit its type, or has one without kinematics");
+	return kinematics;
 }
 
 std::vector<double> State(const VFkSettings& i_rSettings, const VSubjectParametrised& i_rSubject, std::size_t i_Size)
@@ -73,22 +79,17 @@ std::vector<double> State(const VFkSettings& i_rSettings, const VSubjectParametr
 }
 
 /// One entry for each of a subject's markers, or rotation observations.
-/// @param i_rRenumbering to the indices of i_rValues, which holds only those that targets name.
 template <typename TNamed, typename TValue>
-VJson ObservationsToJson(const std::vector<TNamed>& i_rNamed, const VRenumbering& i_rRenumbering,
-    const std::vector<TValue>& i_rValues, const std::vector<bool>& i_rValid, const char* i_pKey,
-    const TValue& i_rWithout)
+VJson ObservationsToJson(const std::vector<TNamed>& i_rNamed, const std::vector<TValue>& i_rValues,
+    const std::vector<bool>& i_rValid, const char* i_pKey)
 {
 	VJson list = VJson::array();
 	for (std::size_t i = 0; i < i_rNamed.size(); ++i)
 	{
-		std::uint32_t index = std::uint32_t(i);
-		i_rRenumbering.Renumber(index);
-		const bool bValid = index < i_rValues.size() && i_rValid[index];
 		VJson item = VJson::object();
 		item["name"] = i_rNamed[i].m_Name;
-		item[i_pKey] = bValid ? i_rValues[index] : i_rWithout;
-		item["valid"] = bValid;
+		item[i_pKey] = i_rValues[i];
+		item["valid"] = bool(i_rValid[i]);
 		list.push_back(std::move(item));
 	}
 	return list;
@@ -96,32 +97,17 @@ VJson ObservationsToJson(const std::vector<TNamed>& i_rNamed, const VRenumbering
 
 EExitStatus ShowPoses(const VFkSettings& i_rSettings)
 {
-	const CoreOrlexTypes::VSubjectRecord record = ReadSubjectFile(i_rSettings.m_File).m_Record;
+	const VSubjectRecord record = ReadSubjectFile(i_rSettings.m_File).m_Record;
 	const VSubjectParametrised& rParametrised = record.m_SubjectParametrised;
-	VSubject subject;
-	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(rParametrised, subject);
-	const ComputeSubject::VSegmentTree tree = SegmentKinematics(subject);
-	if (tree.size() != subject.m_Segments.size())
-		throw VCommandError(EBadInput,
-		    "\"" + i_rSettings.m_File + "\" has segments that make no tree, or more than one: they have no kinematics");
-	DropUnusable(tree, record.m_SubjectApplicationData, subject.m_Targets);
-	// Kinematics count the markers and observations that targets name, and take them as the first of their lists.
-	const VRenumbering markers = CoreOrlexTypesUtils::NamedMarkers(subject);
-	const VRenumbering rotations = CoreOrlexTypesUtils::NamedRotations(subject);
-	for (VSubject::VTarget& rTarget : subject.m_Targets)
-	{
-		markers.Renumber(rTarget.m_MarkerIndices);
-		rotations.Renumber(rTarget.m_RotationObservationIndices);
-	}
-	VComputeSubjectFK fk(subject);
-	fk.Update(State(i_rSettings, rParametrised, fk.NumberOfStates()).data());
+	CoreOrlexTypesUtils::VSubjectKinematics kinematics = MakeKinematics(i_rSettings.m_File, record);
+	kinematics.Update(State(i_rSettings, rParametrised, kinematics.NumberOfStates()).data());
 
 	VJson segments = VJson::array();
-	for (std::size_t i = 0; i < subject.m_Segments.size(); ++i)
+	for (std::size_t i = 0; i < rParametrised.m_Segments.size(); ++i)
 	{
-		const Rotation::VPose<double> pose = fk.Segment(i).SegmentPose();
+		const Rotation::VPose<double> pose = kinematics.Segment(i).SegmentPose();
 		VJson segment = VJson::object();
-		segment["name"] = subject.m_Segments[i].m_Name;
+		segment["name"] = rParametrised.m_Segments[i].m_Name;
 		segment["rotation"] = pose.R;
 		segment["translation"] = pose.t;
 		segments.push_back(std::move(segment));
@@ -130,12 +116,11 @@ EExitStatus ShowPoses(const VFkSettings& i_rSettings)
 	result["segments"] = std::move(segments);
 	std::vector<bool> valid;
 	std::vector<Rotation::VVector3> positions;
-	fk.ComputeMarkers(positions, valid);
-	result["markers"] = ObservationsToJson(rParametrised.m_Markers, markers, positions, valid, "position", {});
+	kinematics.ComputeMarkers(positions, valid);
+	result["markers"] = ObservationsToJson(rParametrised.m_Markers, positions, valid, "position");
 	std::vector<Rotation::VMatrix3> orientations;
-	fk.ComputeRotations(orientations, valid);
-	result["rotations"] = ObservationsToJson(
-	    rParametrised.m_Rotations, rotations, orientations, valid, "rotation", Rotation::c_Identity3);
+	kinematics.ComputeRotations(orientations, valid);
+	result["rotations"] = ObservationsToJson(rParametrised.m_Rotations, orientations, valid, "rotation");
 	PrintJson(result);
 	return EFine;
 }

@@ -264,21 +264,55 @@ TEST_F(RenderSubject, StaysWhereItWasWithoutAPose)
 	ExpectVector(Data().m_PositionTargets[0].m_PositionAndSize, {0, 1320, 130, 20});
 }
 
+/// Kinematics count the markers that targets name, wherever in the list these stand, and have no place for directions.
+TEST_F(RenderSubject, MarkersBehindOneThatNoTargetNames)
+{
+	VTestLog log("System");
+	VSubject subject = TestSubject::Make();
+	subject.m_Markers.insert(subject.m_Markers.begin(), VSubject::VMarker{"Spare", 0, 7.0, false, 0.0});
+	subject.m_Rotations.insert(subject.m_Rotations.begin(), VSubject::VRotation{"Spare", 0});
+	for (VSubject::VTarget& rTarget : subject.m_Targets)
+	{
+		for (std::uint32_t& rIndex : rTarget.m_MarkerIndices)
+			++rIndex;
+		for (std::uint32_t& rIndex : rTarget.m_RotationObservationIndices)
+			++rIndex;
+	}
+	VSubject::VTarget direction = subject.m_Targets[ERotation];
+	direction.m_Type = VSubject::VTarget::ELocalDirectionToWorldDirection;
+	subject.m_Targets.insert(subject.m_Targets.begin(), direction);
+	Make(subject, MakeData());
+	Update(&m_Pose);
+	EXPECT_EQ(log.Take(), std::vector<std::string>());
+	ASSERT_EQ(Markers().m_Markers.size(), 3u) << "the spare one has no place";
+	ExpectVector(Markers().m_Markers[0].m_PositionAndSize, {0, 320, 130, 7});
+	ExpectVector(Markers().m_Markers[1].m_PositionAndSize, {10, 360, 190, 7});
+	ExpectVector(Markers().m_Markers[2].m_PositionAndSize, {10, 280, 190, 7});
+	EXPECT_EQ(Data().m_RotationTargets.size(), 1u);
+	EXPECT_EQ(Data().m_PositionTargets.size(), 2u);
+}
+
 TEST_F(RenderSubject, TellsOnceOfKinematicsThatCannotBeBuilt)
 {
 	VTestLog log("Tessel");
 	VSubject forward = TestSubject::Make();
 	forward.m_Segments[ESpine].m_ParentSegmentIndex = ELimb;
-	VSubject noState = TestSubject::Make();
-	noState.m_Targets[EPoint].m_State.clear();
-	for (const VSubject& rSubject : {forward, noState})
+	VSubject misfits = TestSubject::Make();
+	misfits.m_Targets[EPoint].m_State.clear();
+	misfits.m_Targets[EBody].m_MarkerIndices[1] = 3;
+	const auto logged = [&](const VSubject& i_rSubject)
 	{
-		Make(rSubject, MakeData());
+		Make(i_rSubject, MakeData());
 		Update(&m_Pose);
 		Update(&m_Pose);
-		EXPECT_TRUE(Data().m_Axes.empty());
-	}
-	EXPECT_EQ(log.Take().size(), 2u);
+		return log.Take().size();
+	};
+	EXPECT_EQ(logged(forward), 1u);
+	EXPECT_TRUE(Data().m_Axes.empty());
+	EXPECT_EQ(logged(misfits), 2u);
+	EXPECT_EQ(Data().m_Axes.size(), 5u);
+	EXPECT_TRUE(Data().m_PositionTargets.empty());
+	EXPECT_EQ(Data().m_RotationTargets.size(), 1u) << "the other target is shown";
 }
 
 TEST(SubjectTypes, NoTwoClassesShareAKind)

@@ -128,8 +128,10 @@ TEST(Fk, PosesOfAHandMadeArm)
 <JointTemplate BIND-POSE="0 0 1.5707963267948966 10 20 1000" PRE-ORIENTATION="0 0 0" PRE-POSITION="0 0 0"/></JointFree>
 <Segment NAME="arm"><JointHinge NAME="j1" AXIS="0 0 1" PRE-ORIENTATION="0 0 0" PRE-POSITION="100 0 0">
 <JointTemplate BIND-POSE="1.5707963267948966" PRE-ORIENTATION="0 0 0" PRE-POSITION="Arm 0 0"/></JointHinge></Segment>
-</Segment></Skeleton><MarkerSet><Markers><Marker NAME="loose"/><Marker NAME="flat"/><Marker NAME="tip"/></Markers>
-</MarkerSet><TargetSet><Targets>
+</Segment></Skeleton><MarkerSet><Markers><Marker NAME="loose"/><Marker NAME="flat"/><Marker NAME="tip"/><Marker NAME="lost"/>
+</Markers></MarkerSet><TargetSet><Targets>
+<TargetLocalPointToWorldPoint NAME="broken" MARKER="lost" SEGMENT="arm" POSITION="Leg 0 0" WEIGHT="1" HIDDEN="false">
+<TargetLocalPointToWorldPointTemplate/></TargetLocalPointToWorldPoint>
 <TargetLocalPlaneToWorldPoint MARKER="flat" SEGMENT="arm" ORIGIN="0 0 0" NORMAL="0 0 1" WEIGHT="1" HIDDEN="false">
 <TargetLocalPlaneToWorldPointTemplate/></TargetLocalPlaneToWorldPoint>
 <TargetLocalPointToWorldPoint MARKER="tip" SEGMENT="arm" POSITION="50 0 0" WEIGHT="1" HIDDEN="false">
@@ -139,8 +141,12 @@ DIRECTION-OBSERVATION="look"/>
 <TargetLocalRotationToWorldRotation SEGMENT="arm" ROTATION="0 0 1.5707963267948966" WEIGHT="1" HIDDEN="false"
 ROTATION-OBSERVATION="aim"/></Targets></TargetSet></KinematicModel>)");
 	const VRun run = folder.Run({"fk", "arm.qrs"});
+	const std::string reason = "Parse Error at column 4: ID \"Leg\" was referenced but never declared\n";
 	EXPECT_EQ(run.m_Err,
-	    "warning retarget: Target #2 \"gaze\" does not fit its type, or has one without kinematics: it is left out\n");
+	    "warning QRTIO: Target 'broken' has the invalid state expression 'Leg': " + reason
+	        + "warning retarget: Target #0 \"broken\" is left out: its state does not evaluate: " + reason
+	        + "warning retarget: Target #3 \"gaze\" is left out: it does not fit its type, or has one without "
+	          "kinematics\n");
 	const VJson bind = VJson::parse(run.m_Out);
 	ASSERT_EQ(bind.at("segments").size(), 2u);
 	EXPECT_EQ(bind["segments"][1].at("name"), "arm");
@@ -148,7 +154,8 @@ ROTATION-OBSERVATION="aim"/></Targets></TargetSet></KinematicModel>)");
 	ExpectNear(bind["segments"][0].at("translation"), {10, 20, 1000}, 1e-12);
 	ExpectNear(bind["segments"][1]["rotation"], {-1, 0, 0, 0, -1, 0, 0, 0, 1}, 1e-12);
 	ExpectNear(bind["segments"][1]["translation"], {10, 120, 1000}, 1e-12);
-	ASSERT_EQ(bind.at("markers").size(), 3u);
+	ASSERT_EQ(bind.at("markers").size(), 4u);
+	EXPECT_EQ(bind["markers"][3].at("valid"), false) << "its target is left out";
 	EXPECT_EQ(bind["markers"][0].at("name"), "loose");
 	EXPECT_EQ(bind["markers"][0].at("valid"), false);
 	EXPECT_EQ(bind["markers"][1].at("valid"), false) << "a plane is no place";

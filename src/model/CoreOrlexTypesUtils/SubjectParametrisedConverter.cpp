@@ -89,6 +89,25 @@ void ConvertTargetBack(const VSubject::VTarget& i_rTarget, VSubjectParametrised:
 		o_rParametrised.m_StateExpressions.push_back(NumberText::PrintG17(state));
 }
 
+/// All but segments, markers and targets, whose lists get their lengths.
+bool Begin(const VSubjectParametrised& i_rParametrised, VDynamicExpressionParserSimple& o_rParser, VSubject& o_rSubject)
+{
+	o_rSubject = {};
+	std::vector<std::string> errors;
+	const bool bGood = o_rParser.Initialise(i_rParametrised, errors);
+	if (!bGood)
+		NVX_LOG("SubjectUtils", NVX::ELogError, "Error parsing subject static parameter expressions");
+	LogErrors(errors);
+	o_rSubject.m_SubjectId = i_rParametrised.m_SubjectId;
+	o_rSubject.m_Name = i_rParametrised.m_Name;
+	o_rSubject.m_Segments.resize(i_rParametrised.m_Segments.size());
+	o_rSubject.m_Markers.resize(i_rParametrised.m_Markers.size());
+	for (const VSubjectParametrised::VRotation& rRotation : i_rParametrised.m_Rotations)
+		o_rSubject.m_Rotations.push_back({rRotation.m_Name, rRotation.m_RotationId});
+	o_rSubject.m_Targets.resize(i_rParametrised.m_Targets.size());
+	return bGood;
+}
+
 } // namespace
 
 bool SubjectParametrisedConverter::ConvertJoint(
@@ -209,28 +228,34 @@ bool SubjectParametrisedConverter::ConvertMarker(
 
 bool SubjectParametrisedConverter::ConvertSubject(const VSubjectParametrised& i_rParametrised, VSubject& o_rSubject)
 {
-	o_rSubject = {};
 	VDynamicExpressionParserSimple parser;
-	std::vector<std::string> errors;
-	bool bGood = parser.Initialise(i_rParametrised, errors);
-	if (!bGood)
-		NVX_LOG("SubjectUtils", NVX::ELogError, "Error parsing subject static parameter expressions");
-	LogErrors(errors);
-
-	o_rSubject.m_SubjectId = i_rParametrised.m_SubjectId;
-	o_rSubject.m_Name = i_rParametrised.m_Name;
-	o_rSubject.m_Segments.resize(i_rParametrised.m_Segments.size());
+	bool bGood = Begin(i_rParametrised, parser, o_rSubject);
 	for (std::size_t i = 0; bGood && i < o_rSubject.m_Segments.size(); ++i)
 		bGood = ConvertSegment(parser, i_rParametrised.m_Segments[i], o_rSubject.m_Segments[i], false);
-	o_rSubject.m_Markers.resize(i_rParametrised.m_Markers.size());
 	for (std::size_t i = 0; bGood && i < o_rSubject.m_Markers.size(); ++i)
 		bGood = ConvertMarker(i_rParametrised.m_Markers[i], o_rSubject.m_Markers[i]);
-	for (const VSubjectParametrised::VRotation& rRotation : i_rParametrised.m_Rotations)
-		o_rSubject.m_Rotations.push_back({rRotation.m_Name, rRotation.m_RotationId});
-	o_rSubject.m_Targets.resize(i_rParametrised.m_Targets.size());
 	for (std::size_t i = 0; bGood && i < o_rSubject.m_Targets.size(); ++i)
 		bGood = ConvertTarget(parser, i_rParametrised.m_Targets[i], o_rSubject.m_Targets[i], false);
 	return bGood;
+}
+
+std::vector<SubjectParametrisedConverter::VTargetFailure> SubjectParametrisedConverter::ConvertAllOfSubject(
+    const VSubjectParametrised& i_rParametrised, VSubject& o_rSubject)
+{
+	VDynamicExpressionParserSimple parser;
+	Begin(i_rParametrised, parser, o_rSubject);
+	for (std::size_t i = 0; i < o_rSubject.m_Segments.size(); ++i)
+		ConvertSegment(parser, i_rParametrised.m_Segments[i], o_rSubject.m_Segments[i], false);
+	for (std::size_t i = 0; i < o_rSubject.m_Markers.size(); ++i)
+		ConvertMarker(i_rParametrised.m_Markers[i], o_rSubject.m_Markers[i]);
+	std::vector<VTargetFailure> failures;
+	for (std::size_t i = 0; i < o_rSubject.m_Targets.size(); ++i)
+	{
+		std::vector<std::string> errors;
+		if (!ConvertTarget(parser, i_rParametrised.m_Targets[i], o_rSubject.m_Targets[i], false, errors))
+			failures.push_back({i, errors.front()});
+	}
+	return failures;
 }
 
 void SubjectParametrisedConverter::ConvertSubject(const VSubject& i_rSubject, VSubjectParametrised& o_rParametrised)

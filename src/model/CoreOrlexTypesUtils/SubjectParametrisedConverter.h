@@ -16,6 +16,18 @@ namespace CoreOrlexTypesUtils::SubjectParametrisedConverter
 /// result false.
 bool ConvertSubject(const CoreOrlexTypes::VSubjectParametrised& i_rParametrised, CoreOrlexTypes::VSubject& o_rSubject);
 
+/// A target whose state does not evaluate, and why.
+struct VTargetFailure
+{
+	std::size_t m_Index = 0;
+	std::string m_Reason;
+};
+
+/// The same without the stop at a failure, which costs only the element that has it. What fails of targets is not
+/// logged but returned.
+std::vector<VTargetFailure> ConvertAllOfSubject(
+    const CoreOrlexTypes::VSubjectParametrised& i_rParametrised, CoreOrlexTypes::VSubject& o_rSubject);
+
 /// Cannot fail. Joint statistics become both the calibrated and the template ones.
 void ConvertSubject(const CoreOrlexTypes::VSubject& i_rSubject, CoreOrlexTypes::VSubjectParametrised& o_rParametrised);
 

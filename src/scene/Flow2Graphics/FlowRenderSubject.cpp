@@ -1,5 +1,6 @@
 #include "Flow2Graphics/FlowRenderSubject.h"
 
+#include "ComputeSubjectFK/ComputeSegmentFK.h"
 #include "ComputeSubjectFK/TargetFKInterfaces.h"
 #include "CoreGraphics/Skin.h"
 #include "DebugServices/GlobalLog.h"
@@ -47,9 +48,9 @@ VFlowRenderSubject::VFlowRenderSubject(std::shared_ptr<const VSubject> i_pSubjec
     std::shared_ptr<const ISubjectSelectionMaker> i_pSelectionMaker)
     : m_pSubject(std::move(i_pSubject)),
       m_pData(i_pData ? std::move(i_pData) : std::make_shared<const VSubjectApplicationData>()),
-      m_pSelectionMaker(std::move(i_pSelectionMaker)), m_Radii(SegmentRadii(*m_pSubject, *m_pData)),
-      m_Origins(OriginSegments(*m_pSubject)), m_SegmentHealth(m_pSubject->m_Segments.size(), 1.0f),
-      m_MarkerStates(m_pSubject->m_Markers.size())
+      m_pSelectionMaker(std::move(i_pSelectionMaker)), m_Kinematics(*m_pSubject),
+      m_Radii(SegmentRadii(*m_pSubject, *m_pData)), m_Origins(OriginSegments(*m_pSubject)),
+      m_SegmentHealth(m_pSubject->m_Segments.size(), 1.0f), m_MarkerStates(m_pSubject->m_Markers.size())
 {
 	const std::string prefix = m_pSubject->m_Name + " : ";
 	for (const VSubject::VSegment& rSegment : m_pSubject->m_Segments)
@@ -63,37 +64,32 @@ VFlowRenderSubject::~VFlowRenderSubject() = default;
 
 void VFlowRenderSubject::Build()
 {
-	try
+	if (!m_Kinematics.IsBuilt())
 	{
-		m_pKinematics = std::make_unique<ComputeSubject::VComputeSubjectFK>(*m_pSubject);
-		if (m_pKinematics->NumberOfSegments() != m_pSubject->m_Segments.size())
-			m_pKinematics.reset();
+		NVX_LOG("Tessel", NVX::ELogError, "The subject %1% is not shown: its segments or joints contradict each other",
+		    m_pSubject->m_Name);
+		return;
 	}
-	catch (const ComputeSubject::VConstructionException&)
-	{
-	}
-	if (m_pKinematics)
-	{
-		m_State.resize(m_pKinematics->NumberOfStates());
-		for (std::size_t i = 0; i < m_pSubject->m_Targets.size(); ++i)
-			if (m_pSubject->m_Targets[i].m_Type == VSubject::VTarget::ERigidBody)
-				m_Clusters.push_back(i);
-	}
-	else
+	m_State.resize(m_Kinematics.NumberOfStates());
+	for (std::size_t i = 0; i < m_pSubject->m_Targets.size(); ++i)
+		if (m_pSubject->m_Targets[i].m_Type == VSubject::VTarget::ERigidBody && m_Kinematics.Target(i))
+			m_Clusters.push_back(i);
+	for (const std::size_t misfit : m_Kinematics.MisfitTargets())
 		NVX_LOG("Tessel", NVX::ELogError,
-		    "The subject %1% is not shown: its segments, joints or targets contradict each other", m_pSubject->m_Name);
+		    "Target #%1% \"%2%\" of the subject %3% is not shown: its values do not fit its type", misfit,
+		    misfit < m_pData->m_Targets.size() ? m_pData->m_Targets[misfit].m_Name : std::string(), m_pSubject->m_Name);
 }
 
 bool VFlowRenderSubject::Evaluate(const CoreOrlexTypes::VSubjectDynamicParameters* i_pPose)
 {
-	if (!m_pKinematics)
+	if (!m_Kinematics.IsBuilt())
 		return false;
 	if (!i_pPose || i_pPose->m_SubjectId != m_pSubject->m_SubjectId || !AllFinite(i_pPose->m_State))
 		return m_bPosed;
 	const std::size_t count = std::min(m_State.size(), i_pPose->m_State.size());
 	std::copy_n(i_pPose->m_State.begin(), count, m_State.begin());
 	std::fill(m_State.begin() + static_cast<std::ptrdiff_t>(count), m_State.end(), 0.0);
-	m_pKinematics->Update(m_State.data());
+	m_Kinematics.Update(m_State.data());
 	std::fill(m_SegmentHealth.begin(), m_SegmentHealth.end(), 1.0f);
 	m_bPosed = true;
 	return true;
@@ -193,18 +189,18 @@ void VFlowRenderSubject::TakeMatrices(const QMatrix4x4& i_rSceneTransform)
 {
 	m_SegmentMatrices.resize(m_pSubject->m_Segments.size());
 	for (std::size_t i = 0; i < m_SegmentMatrices.size(); ++i)
-		m_SegmentMatrices[i] = i_rSceneTransform * ToMatrix(m_pKinematics->Segment(i).SegmentPose());
+		m_SegmentMatrices[i] = i_rSceneTransform * ToMatrix(m_Kinematics.Segment(i).SegmentPose());
 }
 
 void VFlowRenderSubject::FillMarkers(const CoreOrlexTypes::VReconstructionLabelSet* i_pLabels,
     OrlexGraphics::VSelectionRegistry& io_rRegistry, const QMatrix4x4& i_rSceneTransform)
 {
-	m_pKinematics->ComputeMarkers(m_ExpectedMarkers, m_ExpectedValid);
+	m_Kinematics.ComputeMarkers(m_ExpectedMarkers, m_ExpectedValid);
 	for (std::size_t i = 0; i < m_MarkerStates.size(); ++i)
 	{
 		VMarkerState& rState = m_MarkerStates[i];
 		rState.m_bPresent = !i_pLabels;
-		rState.m_bPlaced = i < m_ExpectedMarkers.size() && m_ExpectedValid[i];
+		rState.m_bPlaced = m_ExpectedValid[i];
 		if (rState.m_bPlaced)
 			rState.m_Position = i_rSceneTransform.map(ToVector(m_ExpectedMarkers[i]));
 	}
@@ -275,7 +271,7 @@ void VFlowRenderSubject::FillTarget(
     std::size_t i_Index, OrlexGraphics::VSelectionRegistry& io_rRegistry, const QMatrix4x4& i_rSceneTransform)
 {
 	const VSubject::VTarget& rTarget = m_pSubject->m_Targets[i_Index];
-	const ComputeSubject::ITargetFK* const pTarget = m_pKinematics->Target(i_Index);
+	const ComputeSubject::ITargetFK* const pTarget = m_Kinematics.Target(i_Index);
 	if (!pTarget || rTarget.m_SegmentIndices.empty() || rTarget.m_SegmentIndices[0] >= m_SegmentMatrices.size())
 		return;
 	const QMatrix4x4& rSegment = m_SegmentMatrices[rTarget.m_SegmentIndices[0]];

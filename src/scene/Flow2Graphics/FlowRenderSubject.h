@@ -1,9 +1,9 @@
 #pragma once
 
-#include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypes/Subject.h"
 #include "CoreOrlexTypes/SubjectApplicationData.h"
 #include "CoreOrlexTypes/SubjectState.h"
+#include "CoreOrlexTypesUtils/SubjectKinematics.h"
 #include "Flow2Graphics/RenderSubjectData.h"
 #include "Flow2Graphics/SubjectTypes.h"
 #include "OrlexGraphics/CameraDefinition.h"
@@ -40,7 +40,8 @@ public:
 		const CoreOrlexTypes::VReconstructionLabelSet* m_pLabels = nullptr;
 	};
 
-	/// A subject whose kinematics cannot be built is told of in the log, and stays empty.
+	/// A subject whose kinematics cannot be built is told of in the log, and stays empty; so is a target that does not
+	/// fit its type, which is left out.
 	/// @param i_pData null for defaults; may be shorter than the subject
 	VFlowRenderSubject(std::shared_ptr<const CoreOrlexTypes::VSubject> i_pSubject,
 	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pData,
@@ -88,11 +89,10 @@ private:
 	const std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubject;
 	const std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> m_pData;
 	const std::shared_ptr<const ISubjectSelectionMaker> m_pSelectionMaker;
-	/// Null if it cannot be built.
-	std::unique_ptr<ComputeSubject::VComputeSubjectFK> m_pKinematics;
+	CoreOrlexTypesUtils::VSubjectKinematics m_Kinematics;
 	std::vector<float> m_Radii;
 	std::vector<bool> m_Origins;
-	/// Targets that are rigid bodies: clusters of markers.
+	/// Targets that are rigid bodies and have kinematics: clusters of markers.
 	std::vector<std::size_t> m_Clusters;
 	std::vector<std::string> m_SegmentNames;
 	std::vector<std::string> m_MarkerNames;
