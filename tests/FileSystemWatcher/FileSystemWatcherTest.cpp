@@ -173,8 +173,59 @@ TEST(FileSystemWatcher, RefusesWhatItCannotWatch)
 		}
 	watcher.SetDirectories({folder / "no"});
 	const VTexts texts = log.Take();
-	ASSERT_EQ(texts.size(), 1u);
+	ASSERT_EQ(texts.size(), 2u);
 	EXPECT_EQ(texts[0].find("2 Error monitoring directory for changes:" + (folder / "no").string()), 0u) << texts[0];
+	EXPECT_EQ(texts[1],
+	    "3 The folder " + (folder / "no").string()
+	        + " does not exist. Make it, or choose another one; it is used as soon as it is there");
+}
+
+/// However a listed directory comes, goes or is replaced: its files are followed.
+TEST(FileSystemWatcher, FollowsListedDirectoriesWhereverTheyStand)
+{
+	const VTestFolder folder;
+	VInbox inbox;
+	VFileSystemWatcher watcher(".fbx");
+	watcher.GetAdded().Connect([&](const path& i_rPath) { inbox.Put("added " + i_rPath.string()); });
+	watcher.GetRefreshed().Connect([&](const path& i_rPath) { inbox.Put("refreshed " + i_rPath.string()); });
+	int file = 0;
+	const auto follows = [&](const char* i_pWhat, const path& i_rListed, bool i_bThere = true)
+	{
+		SCOPED_TRACE(i_pWhat);
+		inbox.TakeTo("refreshed " + i_rListed.string());
+		const path put = i_rListed / (std::to_string(++file) + ".fbx");
+		if (!i_bThere)
+			return;
+		Put(put, "");
+		inbox.TakeTo("added " + put.string());
+	};
+	const path deep = folder / "a/b/skins";
+	const path link = folder / "link";
+	const path odd = folder / "u/./../u";
+	watcher.SetDirectories({deep, link, odd});
+	create_directory(folder / "a");
+	create_directory(folder / "a/b");
+	// The thread has seen both when it tells of another directory.
+	create_directory(folder / "u");
+	follows("an odd spelling", odd);
+	create_directory(deep);
+	follows("step by step", deep);
+	rename(folder / "a", folder / "elsewhere");
+	follows("a directory above is renamed", deep, false);
+	create_directories(deep);
+	follows("another one in its place", deep);
+	rename(folder / "a", folder / "old");
+	follows("gone with one above", deep, false);
+	rename(folder / "elsewhere", folder / "a");
+	follows("the first one is back", deep);
+	remove_all(deep);
+	follows("gone", deep, false);
+	create_directory_symlink(folder / "old", link);
+	follows("a link", link);
+	remove(link);
+	follows("no link", link, false);
+	create_directory_symlink(folder / "a", link);
+	follows("a link to another directory", link);
 }
 
 TEST(FileSystemWatcher, TellsWhenADirectoryGoes)
@@ -249,7 +300,7 @@ TEST(FileSystemWatcher, GoesOnAfterWhatWentWrong)
 		    });
 		pMonitor->Send({{1, EFileChange(6), "x", false}, {1, EFileChange(0), "x", true}, {7, EAdded, "unknown watch"},
 		    {1, EAdded, "throw"}, {-1, EAdded, {}, false, 0, "lost", false}, {1, EAdded, {}, false, 0, "broken", true},
-		    {1, EAdded, "after its end"}, {2, EAdded, "a"}});
+		    {1, EAdded, "after its end"}, {-1, EAdded, {}}, {2, EAdded, "a"}});
 		EXPECT_EQ(inbox.TakeTo("two added a"),
 		    (VTexts{"added throw", "directory modified one", "two directory modified two", "directory removed one",
 		        "two added a"}));

@@ -278,4 +278,27 @@ TEST_F(SkinCache, FollowsTheFolders)
 	EXPECT_EQ(m_pSkin, pWorn) << "whoever wears it keeps it";
 }
 
+TEST_F(SkinCache, FollowsFoldersThatComeAndGo)
+{
+	WriteHero("a/Hero.fbx");
+	SetFolders({m_Root / "a", m_Root / "not/yet"});
+	EXPECT_EQ(Load("Hero"), SkinStatus::c_Ready);
+	EXPECT_EQ(Status("Villain"), SkinStatus::c_NotFound);
+
+	boost::filesystem::create_directories(m_Root / "new/yet");
+	WriteHero("new/yet/Hero.fbx");
+	WriteHero("new/yet/Villain.fbx");
+	boost::filesystem::rename(m_Root / "new", m_Root / "not");
+	ASSERT_TRUE(WaitForChange());
+	EXPECT_EQ(Load("Villain"), SkinStatus::c_Ready);
+	EXPECT_EQ(Load("Hero"), SkinStatus::c_Ready) << "the later folder's now";
+	boost::filesystem::rename(m_Root / "not", m_Root / "new");
+	ASSERT_TRUE(WaitForChange());
+	EXPECT_EQ(Status("Villain"), SkinStatus::c_NotFound);
+	EXPECT_EQ(Load("Hero"), SkinStatus::c_Ready);
+	boost::filesystem::rename(m_Root / "new", m_Root / "not");
+	ASSERT_TRUE(WaitForChange());
+	EXPECT_EQ(Load("Villain"), SkinStatus::c_Ready) << "back again";
+}
+
 } // namespace

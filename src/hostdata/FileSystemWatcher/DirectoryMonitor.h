@@ -16,7 +16,7 @@ namespace FileSystemWatcher
 /// One event as a system tells it.
 struct VSystemEvent
 {
-	/// What Add returned.
+	/// What Add returned; below 0 for all, without an error: other directories may stand where those watched stood.
 	int m_Watch = 0;
 	EFileChange m_Change = EAdded;
 	/// Name within the directory in UTF-8; empty for an error.
@@ -42,7 +42,8 @@ class IDirectoryMonitor
 {
 public:
 	virtual ~IDirectoryMonitor() = default;
-	/// @return a number that is never used again. @throw boost::system::system_error
+	/// @return a number above 0 that is never used again; for a directory that is watched already it may be the same.
+	/// @throw boost::system::system_error
 	virtual int Add(const boost::filesystem::path& i_rDirectory) = 0;
 	virtual void Remove(int i_Watch) = 0;
 	/// Waits for events, whose names are in their final form.

@@ -3,6 +3,7 @@
 #include <boost/system/system_error.hpp>
 
 #include <cerrno>
+#include <fcntl.h>
 #include <poll.h>
 #include <sys/eventfd.h>
 #include <sys/inotify.h>
@@ -37,7 +38,8 @@ class VInotifyMonitor final : public IDirectoryMonitor
 {
 public:
 	VInotifyMonitor()
-	    : m_Inotify(::inotify_init1(IN_NONBLOCK | IN_CLOEXEC)), m_Stop(::eventfd(0, EFD_NONBLOCK | EFD_CLOEXEC))
+	    : m_Inotify(::inotify_init1(IN_NONBLOCK | IN_CLOEXEC)), m_Stop(::eventfd(0, EFD_NONBLOCK | EFD_CLOEXEC)),
+	      m_Mounts(::open("/proc/self/mountinfo", O_RDONLY | O_CLOEXEC))
 	{
 		if (m_Inotify >= 0 && m_Stop >= 0)
 			return;
@@ -65,13 +67,20 @@ public:
 		int timeout = -1;
 		do
 		{
-			pollfd files[] = {{m_Inotify, POLLIN, 0}, {m_Stop, POLLIN, 0}};
-			const int ready = ::poll(files, 2, timeout);
+			// One that could not be opened is passed over.
+			pollfd files[] = {{m_Inotify, POLLIN, 0}, {m_Stop, POLLIN, 0}, {m_Mounts, POLLPRI, 0}};
+			const int ready = ::poll(files, 3, timeout);
 			if (ready < 0 && errno == EINTR)
 				continue;
 			if (files[1].revents != 0)
 				return false;
-			const bool bMore = ready > 0 && Read(o_rEvents);
+			const bool bMore = files[0].revents != 0 && Read(o_rEvents);
+			if (files[2].revents != 0)
+			{
+				VSystemEvent event;
+				event.m_Watch = -1;
+				o_rEvents.push_back(std::move(event));
+			}
 			timeout = PairRenames(o_rEvents, bMore) ? c_PartnerMilliseconds : -1;
 		} while (timeout >= 0 || o_rEvents.empty());
 		return true;
@@ -87,7 +96,7 @@ public:
 private:
 	void CloseAll()
 	{
-		for (const int descriptor : {m_Inotify, m_Stop})
+		for (const int descriptor : {m_Inotify, m_Stop, m_Mounts})
 			if (descriptor >= 0)
 				::close(descriptor);
 	}
@@ -131,6 +140,8 @@ private:
 
 	const int m_Inotify;
 	const int m_Stop;
+	/// Ready when a file system is mounted or unmounted, which no directory tells of.
+	const int m_Mounts;
 };
 
 } // namespace

@@ -9,6 +9,7 @@
 #include <boost/system/system_error.hpp>
 
 #include <atomic>
+#include <functional>
 #include <map>
 #include <mutex>
 #include <thread>
@@ -25,24 +26,45 @@ void LogFailure(const std::string& i_rError)
 	NVX_LOG("FilesystemWatcher", NVX::ELogError, "Error monitoring directory for changes:%1%", i_rError);
 }
 
-/// One directory however it is spelled.
-path Key(const path& i_rDirectory)
-{
-	boost::system::error_code error;
-	const path canonical = boost::filesystem::canonical(i_rDirectory, error);
-	return error ? i_rDirectory : canonical;
-}
-
-/// A directory that is watched, for callbacks of its own, for the three signals of the watcher, or both.
+/// A directory that is watched: for callbacks of its own, for the signals of the watcher, or because it stands above
+/// one of those.
 struct VDirectory
 {
 	path m_Path;
 	int m_Watch = 0;
-	bool m_bListed = false;
 	bool m_bCallbacks = false;
+	/// The listed directories that are this one, as they were given.
+	std::set<path> m_Listed;
+	/// By the next name on the way: the listed directories below this one.
+	std::multimap<std::string, path> m_ListedBelow;
 	VFileSystemWatcher::VChangeSignal m_Files;
 	VFileSystemWatcher::VChangeSignal m_Directories;
 };
+
+/// What there is to tell of a listed directory once the lock is gone.
+struct VNews
+{
+	path m_Directory;
+	boost::system::error_code m_Error;
+	/// What the system said; empty if the directory is watched.
+	std::string m_Reason;
+};
+
+void TellOperator(const VNews& i_rNews)
+{
+	const std::string directory = UtilsFileSystem::ToUtf8(i_rNews.m_Directory);
+	if (i_rNews.m_Reason.empty())
+		NVX_LOG("FilesystemWatcher", NVX::ELogInformation, "The folder %1% is there: what it holds is looked at again",
+		    directory);
+	else if (i_rNews.m_Error == boost::system::errc::no_such_file_or_directory)
+		NVX_LOG("FilesystemWatcher", NVX::ELogWarning,
+		    "The folder %1% does not exist. Make it, or choose another one; it is used as soon as it is there",
+		    directory);
+	else
+		NVX_LOG("FilesystemWatcher", NVX::ELogWarning,
+		    "The folder %1% cannot be watched (%2%): what changes in it is not followed", directory,
+		    i_rNews.m_Error.message());
+}
 
 } // namespace
 
@@ -56,15 +78,31 @@ struct VFileSystemWatcher::VState
 	/// Under the lock: an event may come before the watch is known here.
 	VDirectory& FindOrAdd(const path& i_rDirectory)
 	{
-		const path key = Key(i_rDirectory);
-		const auto it = m_Directories.find(key);
-		if (it != m_Directories.end())
-			return *it->second;
-		auto pDirectory = std::make_shared<VDirectory>();
-		pDirectory->m_Path = i_rDirectory;
-		pDirectory->m_Watch = m_pMonitor->Add(i_rDirectory);
-		m_Watches[pDirectory->m_Watch] = key;
-		return *(m_Directories[key] = std::move(pDirectory));
+		const auto it = m_Directories.find(UtilsFileSystem::Canonical(i_rDirectory));
+		return it != m_Directories.end() ? *it->second : Renew(i_rDirectory);
+	}
+
+	/// The directory that stands at a path now, which may be another one than before.
+	VDirectory& Renew(const path& i_rDirectory)
+	{
+		const int watch = m_pMonitor->Add(i_rDirectory);
+		if (const auto known = m_Watches.find(watch); known != m_Watches.end())
+			return *m_Directories[known->second];
+		const path key = UtilsFileSystem::Canonical(i_rDirectory);
+		std::shared_ptr<VDirectory>& rpDirectory = m_Directories[key];
+		if (!rpDirectory)
+		{
+			rpDirectory = std::make_shared<VDirectory>();
+			rpDirectory->m_Path = i_rDirectory;
+		}
+		else
+		{
+			m_pMonitor->Remove(rpDirectory->m_Watch);
+			m_Watches.erase(rpDirectory->m_Watch);
+		}
+		rpDirectory->m_Watch = watch;
+		m_Watches[watch] = key;
+		return *rpDirectory;
 	}
 
 	void Drop(int i_Watch)
@@ -72,8 +110,116 @@ struct VFileSystemWatcher::VState
 		const auto it = m_Watches.find(i_Watch);
 		if (it == m_Watches.end())
 			return;
+		m_pMonitor->Remove(i_Watch);
 		m_Directories.erase(it->second);
 		m_Watches.erase(it);
+	}
+
+	void DropUnused()
+	{
+		std::vector<int> unused;
+		for (const auto& [rKey, rpDirectory] : m_Directories)
+			if (!rpDirectory->m_bCallbacks && rpDirectory->m_Listed.empty() && rpDirectory->m_ListedBelow.empty())
+				unused.push_back(rpDirectory->m_Watch);
+		for (const int watch : unused)
+			Drop(watch);
+	}
+
+	void Unlist(const path& i_rListed)
+	{
+		for (const auto& [rKey, rpDirectory] : m_Directories)
+		{
+			rpDirectory->m_Listed.erase(i_rListed);
+			std::erase_if(
+			    rpDirectory->m_ListedBelow, [&](const auto& i_rBelow) { return i_rBelow.second == i_rListed; });
+		}
+	}
+
+	/// Watches a listed directory, and all above it as far as they are there: that is where it appears, and where
+	/// another one takes its place. From the top, so that what appears meanwhile is told.
+	/// @return its watch, 0 for none
+	int Follow(const path& i_rListed, VNews& o_rNews)
+	{
+		Unlist(i_rListed);
+		const path whole = boost::filesystem::absolute(i_rListed);
+		path above = whole.root_path();
+		for (const path& rPart : whole.relative_path())
+		{
+			try
+			{
+				Renew(above).m_ListedBelow.emplace(UtilsFileSystem::ToUtf8(rPart), i_rListed);
+			}
+			catch (const boost::system::system_error&)
+			{
+				// It is not there, or closed to this user.
+			}
+			above /= rPart;
+		}
+		o_rNews.m_Directory = i_rListed;
+		try
+		{
+			VDirectory& rDirectory = Renew(whole);
+			rDirectory.m_Listed.insert(i_rListed);
+			return rDirectory.m_Watch;
+		}
+		catch (const boost::system::system_error& rError)
+		{
+			o_rNews.m_Error = rError.code();
+			o_rNews.m_Reason = rError.what();
+			return 0;
+		}
+	}
+
+	/// The listed directories that may be others, or not be there, after an event.
+	/// @param o_rLost those whose content must be looked at again in any case.
+	std::set<path> Concerned(const VSystemEvent& i_rEvent, std::set<path>& o_rLost) const
+	{
+		std::set<path> concerned;
+		for (const auto& [rKey, rpDirectory] : m_Directories)
+		{
+			if (rpDirectory->m_Watch != i_rEvent.m_Watch && i_rEvent.m_Watch >= 0)
+				continue;
+			if (!i_rEvent.m_Error.empty())
+				o_rLost.insert(rpDirectory->m_Listed.begin(), rpDirectory->m_Listed.end());
+			const auto [begin, end] = i_rEvent.m_Name.empty()
+			    ? std::pair(rpDirectory->m_ListedBelow.begin(), rpDirectory->m_ListedBelow.end())
+			    : rpDirectory->m_ListedBelow.equal_range(i_rEvent.m_Name);
+			for (auto it = begin; it != end; ++it)
+				// A change of rights may open one that was closed; all else that is modified stays what it is.
+				if (i_rEvent.m_Name.empty() || i_rEvent.m_Change != EModified || m_Listed.at(it->second) == 0)
+					concerned.insert(it->second);
+		}
+		concerned.insert(o_rLost.begin(), o_rLost.end());
+		return concerned;
+	}
+
+	/// Brings the listed directories up to date after an event.
+	void Refresh(const VSystemEvent& i_rEvent)
+	{
+		std::vector<VNews> news;
+		std::set<path> changed;
+		{
+			const std::lock_guard lock(m_Mutex);
+			const std::set<path> concerned = Concerned(i_rEvent, changed);
+			if (i_rEvent.m_bEnded)
+				Drop(i_rEvent.m_Watch);
+			for (const path& rListed : concerned)
+			{
+				VNews of;
+				const int watch = Follow(rListed, of);
+				if (const int before = std::exchange(m_Listed[rListed], watch); before != watch)
+				{
+					changed.insert(rListed);
+					news.push_back(std::move(of));
+				}
+			}
+			if (!concerned.empty())
+				DropUnused();
+		}
+		for (const VNews& rNews : news)
+			TellOperator(rNews);
+		for (const path& rListed : changed)
+			m_Refreshed.Fire(rListed);
 	}
 
 	/// @return the directories that an event is about: one, or all when the system lost changes of any.
@@ -84,16 +230,13 @@ struct VFileSystemWatcher::VState
 		for (const auto& [rKey, rpDirectory] : m_Directories)
 			if (rpDirectory->m_Watch == i_rEvent.m_Watch || i_rEvent.m_Watch < 0)
 				found.push_back(rpDirectory);
-		if (i_rEvent.m_bEnded)
-		{
-			m_pMonitor->Remove(i_rEvent.m_Watch);
-			Drop(i_rEvent.m_Watch);
-		}
 		return found;
 	}
 
 	void Deliver(const VSystemEvent& i_rEvent)
 	{
+		if (i_rEvent.m_Watch < 0 && i_rEvent.m_Error.empty())
+			return;
 		for (const std::shared_ptr<VDirectory>& rpDirectory : Find(i_rEvent))
 		{
 			if (!i_rEvent.m_Error.empty())
@@ -112,28 +255,42 @@ struct VFileSystemWatcher::VState
 
 	void DeliverChange(VDirectory& i_rDirectory, const VSystemEvent& i_rEvent)
 	{
-		const path file = i_rDirectory.m_Path / UtilsFileSystem::PathFromUtf8(i_rEvent.m_Name);
-		(i_rEvent.m_bDirectory ? i_rDirectory.m_Directories : i_rDirectory.m_Files).Fire(i_rEvent.m_Change, file);
-		bool bListed = false;
+		const path name = UtilsFileSystem::PathFromUtf8(i_rEvent.m_Name);
+		(i_rEvent.m_bDirectory ? i_rDirectory.m_Directories : i_rDirectory.m_Files)
+		    .Fire(i_rEvent.m_Change, i_rDirectory.m_Path / name);
+		if (i_rEvent.m_bDirectory
+		    || (!m_Extension.empty()
+		        && !boost::algorithm::iequals(UtilsFileSystem::ToUtf8(name.extension()), m_Extension)))
+			return;
+		std::set<path> listed;
 		{
 			const std::lock_guard lock(m_Mutex);
-			bListed = i_rDirectory.m_bListed;
+			listed = i_rDirectory.m_Listed;
 		}
-		if (!bListed || i_rEvent.m_bDirectory
-		    || (!m_Extension.empty()
-		        && !boost::algorithm::iequals(UtilsFileSystem::ToUtf8(file.extension()), m_Extension)))
-			return;
-		switch (i_rEvent.m_Change)
-		{
-		case EAdded:
-		case ERenamedNew: m_Added.Fire(file); break;
-		case ERemoved:
-		case ERenamedOld: m_Removed.Fire(file); break;
-		case EModified: m_Modified.Fire(file); break;
-		}
+		for (const path& rListed : listed)
+			switch (i_rEvent.m_Change)
+			{
+			case EAdded:
+			case ERenamedNew: m_Added.Fire(rListed / name); break;
+			case ERemoved:
+			case ERenamedOld: m_Removed.Fire(rListed / name); break;
+			case EModified: m_Modified.Fire(rListed / name); break;
+			}
 	}
 
 	/// Callbacks of others run on the watcher's thread: what they throw must not end the process.
+	static void Guarded(const std::function<void()>& i_rCall)
+	{
+		try
+		{
+			i_rCall();
+		}
+		catch (const std::exception& rError)
+		{
+			LogFailure(rError.what());
+		}
+	}
+
 	void Run()
 	{
 		std::vector<VSystemEvent> events;
@@ -142,14 +299,8 @@ struct VFileSystemWatcher::VState
 			{
 				if (m_bStopped)
 					return;
-				try
-				{
-					Deliver(rEvent);
-				}
-				catch (const std::exception& rError)
-				{
-					LogFailure(rError.what());
-				}
+				Guarded([&] { Deliver(rEvent); });
+				Guarded([&] { Refresh(rEvent); });
 			}
 	}
 
@@ -158,13 +309,16 @@ struct VFileSystemWatcher::VState
 	VPathSignal m_Added;
 	VPathSignal m_Removed;
 	VPathSignal m_Modified;
+	VPathSignal m_Refreshed;
 	std::thread m_Thread;
 	std::atomic<bool> m_bStopped{false};
 
 	std::mutex m_Mutex;
-	/// By Key.
+	/// By canonical path.
 	std::map<path, std::shared_ptr<VDirectory>> m_Directories;
 	std::map<int, path> m_Watches;
+	/// As they were given, with their watch; 0 for one that is not there.
+	std::map<path, int> m_Listed;
 };
 
 VFileSystemWatcher::VFileSystemWatcher(const std::string& i_rExtension)
@@ -203,36 +357,24 @@ void VFileSystemWatcher::Watch(const path& i_rDirectory, VChangeSignal::VCallbac
 
 void VFileSystemWatcher::SetDirectories(const std::set<path>& i_rDirectories)
 {
-	std::set<path> keys;
-	std::vector<std::string> failures;
+	std::vector<VNews> failures;
 	{
 		const std::lock_guard lock(m_pState->m_Mutex);
+		for (const auto& [rListed, watch] : std::exchange(m_pState->m_Listed, {}))
+			m_pState->Unlist(rListed);
 		for (const path& rDirectory : i_rDirectories)
-			try
-			{
-				m_pState->FindOrAdd(rDirectory).m_bListed = true;
-				keys.insert(Key(rDirectory));
-			}
-			catch (const boost::system::system_error& rError)
-			{
-				failures.push_back(UtilsFileSystem::ToUtf8(rDirectory) + ": " + rError.what());
-			}
-		std::vector<int> unused;
-		for (const auto& [rKey, rpDirectory] : m_pState->m_Directories)
-			if (!keys.contains(rKey))
-			{
-				rpDirectory->m_bListed = false;
-				if (!rpDirectory->m_bCallbacks)
-					unused.push_back(rpDirectory->m_Watch);
-			}
-		for (const int watch : unused)
 		{
-			m_pState->m_pMonitor->Remove(watch);
-			m_pState->Drop(watch);
+			VNews news;
+			if ((m_pState->m_Listed[rDirectory] = m_pState->Follow(rDirectory, news)) == 0)
+				failures.push_back(std::move(news));
 		}
+		m_pState->DropUnused();
 	}
-	for (const std::string& rFailure : failures)
-		LogFailure(rFailure);
+	for (const VNews& rFailure : failures)
+	{
+		LogFailure(UtilsFileSystem::ToUtf8(rFailure.m_Directory) + ": " + rFailure.m_Reason);
+		TellOperator(rFailure);
+	}
 }
 
 VFileSystemWatcher::VPathSignal& VFileSystemWatcher::GetAdded()
@@ -248,6 +390,11 @@ VFileSystemWatcher::VPathSignal& VFileSystemWatcher::GetRemoved()
 VFileSystemWatcher::VPathSignal& VFileSystemWatcher::GetModified()
 {
 	return m_pState->m_Modified;
+}
+
+VFileSystemWatcher::VPathSignal& VFileSystemWatcher::GetRefreshed()
+{
+	return m_pState->m_Refreshed;
 }
 
 } // namespace FileSystemWatcher

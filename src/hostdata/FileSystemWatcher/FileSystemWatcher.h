@@ -25,7 +25,7 @@ public:
 	using VChangeSignal = NVX::VSignal<EFileChange, boost::filesystem::path>;
 	using VPathSignal = NVX::VSignal<boost::filesystem::path>;
 
-	/// @param i_rExtension of the files that the three signals tell of, such as ".fbx", in any case; empty for all.
+	/// @param i_rExtension of the files that the signals tell of, such as ".fbx", in any case; empty for all.
 	/// @throw boost::system::system_error if the system has no means left to watch directories.
 	explicit VFileSystemWatcher(const std::string& i_rExtension = {});
 	/// For tests: events come from the given monitor.
@@ -43,13 +43,16 @@ public:
 	    VChangeSignal::VCallback i_DirectoryCallback = {},
 	    std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher = {});
 
-	/// Replaces the directories whose files the three signals tell of. Those that cannot be watched are told in the
-	/// log.
+	/// Replaces the directories whose files the signals tell of. One that cannot be watched, or is gone, is told in the
+	/// log and watched as soon as it is there: the directories above it are watched, too.
 	void SetDirectories(const std::set<boost::filesystem::path>& i_rDirectories);
 	/// A new name is added, an old one removed.
 	VPathSignal& GetAdded();
 	VPathSignal& GetRemoved();
 	VPathSignal& GetModified();
+	/// One of the directories, as it was given, whose content should be looked at again: it appeared, another one took
+	/// its place, it is gone, or changes in it were lost.
+	VPathSignal& GetRefreshed();
 
 private:
 	struct VState;

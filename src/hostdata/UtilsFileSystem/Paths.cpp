@@ -1,5 +1,7 @@
 #include "UtilsFileSystem/Paths.h"
 
+#include <boost/filesystem/operations.hpp>
+
 #include <algorithm>
 
 std::wstring UtilsFileSystem::AddLongPathPrefix(std::wstring i_Path, std::size_t i_Limit)
@@ -11,4 +13,11 @@ std::wstring UtilsFileSystem::AddLongPathPrefix(std::wstring i_Path, std::size_t
 	if (i_Path.starts_with(L"\\\\"))
 		return L"\\\\?\\UNC" + i_Path.substr(1);
 	return L"\\\\?\\" + i_Path;
+}
+
+boost::filesystem::path UtilsFileSystem::Canonical(const boost::filesystem::path& i_rPath)
+{
+	boost::system::error_code error;
+	const boost::filesystem::path canonical = boost::filesystem::canonical(i_rPath, error);
+	return error ? i_rPath : canonical;
 }

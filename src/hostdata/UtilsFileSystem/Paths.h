@@ -16,4 +16,7 @@ std::string ToUtf8(const boost::filesystem::path& i_rPath);
 /// "\\?\", or "\\?\UNC" for a network path. Shorter paths and those that have a prefix come back as they are.
 std::wstring AddLongPathPrefix(std::wstring i_Path, std::size_t i_Limit);
 
+/// One path for a file or directory however it is spelled; what is not there stays as it is.
+boost::filesystem::path Canonical(const boost::filesystem::path& i_rPath);
+
 } // namespace UtilsFileSystem

@@ -22,6 +22,24 @@ constexpr const char* c_pExtension = ".fbx";
 /// Copying a file changes it many times.
 constexpr std::chrono::milliseconds c_ChangeDelay{1000};
 
+boost::filesystem::path FileIn(const boost::filesystem::path& i_rFolder, const std::string& i_rName)
+{
+	return i_rFolder / UtilsFileSystem::PathFromUtf8(i_rName + c_pExtension);
+}
+
+/// The file of a skin in the last folder that has one; empty for none.
+boost::filesystem::path FindFile(const std::vector<boost::filesystem::path>& i_rFolders, const std::string& i_rName)
+{
+	boost::filesystem::path found;
+	for (const boost::filesystem::path& rFolder : i_rFolders)
+	{
+		boost::system::error_code error;
+		if (boost::filesystem::exists(FileIn(rFolder, i_rName), error))
+			found = FileIn(rFolder, i_rName);
+	}
+	return found;
+}
+
 class VQtDelay : public IDelay
 {
 public:
@@ -93,6 +111,9 @@ std::shared_ptr<FileSystemWatcher::VFileSystemWatcher> VSkinCache::MakeWatcher(c
 		{ call(i_rGroup, i_rPath); };
 		for (auto* const pSignal : {&pWatcher->GetAdded(), &pWatcher->GetRemoved(), &pWatcher->GetModified()})
 			pSignal->Connect(onChange, m_pDispatcher);
+		pWatcher->GetRefreshed().Connect([i_rGroup, call = WeakBind(&VSkinCache::OnFolder)](
+		                                     const boost::filesystem::path& i_rFolder) { call(i_rGroup, i_rFolder); },
+		    m_pDispatcher);
 		return pWatcher;
 	}
 	catch (const boost::system::system_error& rError)
@@ -113,13 +134,7 @@ std::shared_ptr<VSkinLoadJob> VSkinCache::Find(
     VSkinEntry& io_rEntry, const std::string& i_rName, const std::vector<boost::filesystem::path>& i_rFolders)
 {
 	io_rEntry.m_Status = SkinStatus::c_NotFound;
-	for (const boost::filesystem::path& rFolder : i_rFolders)
-	{
-		const boost::filesystem::path path = rFolder / UtilsFileSystem::PathFromUtf8(i_rName + c_pExtension);
-		boost::system::error_code error;
-		if (boost::filesystem::exists(path, error))
-			io_rEntry.m_Path = path;
-	}
+	io_rEntry.m_Path = FindFile(i_rFolders, i_rName);
 	if (io_rEntry.m_Path.empty())
 		return {};
 	io_rEntry.m_Status = SkinStatus::c_Loading;
@@ -234,6 +249,25 @@ void VSkinCache::OnChange(const std::string& i_rGroup, const boost::filesystem::
 		NVX_LOG("VSkinCache", NVX::ELogDetail, "Detected a change to %1%", UtilsFileSystem::ToUtf8(i_rPath));
 		if (const auto group = m_Groups.find(i_rGroup); group != m_Groups.end())
 			group->second.m_Entries.erase(UtilsFileSystem::ToUtf8(i_rPath.stem()));
+	}
+	m_pDelay->Start(c_ChangeDelay, [this] { m_ChangedSignal.Fire(); });
+}
+
+void VSkinCache::OnFolder(const std::string& i_rGroup, const boost::filesystem::path& i_rFolder)
+{
+	{
+		const std::lock_guard lock(m_Mutex);
+		const auto group = m_Groups.find(i_rGroup);
+		if (m_bDisposed || group == m_Groups.end())
+			return;
+		NVX_LOG("VSkinCache", NVX::ELogDetail, "Detected a change to %1%", UtilsFileSystem::ToUtf8(i_rFolder));
+		std::erase_if(group->second.m_Entries,
+		    [&](const auto& i_rNamed)
+		    {
+			    const auto& [rName, rEntry] = i_rNamed;
+			    const boost::filesystem::path file = FindFile(group->second.m_Folders, rName);
+			    return file != rEntry.m_Path || file == FileIn(i_rFolder, rName);
+		    });
 	}
 	m_pDelay->Start(c_ChangeDelay, [this] { m_ChangedSignal.Fire(); });
 }

@@ -126,6 +126,8 @@ private:
 	void Run(const std::shared_ptr<VSkinLoadJob>& i_rpJob);
 	void OnLoaded(const std::shared_ptr<VSkinLoadJob>& i_rpJob);
 	void OnChange(const std::string& i_rGroup, const boost::filesystem::path& i_rPath);
+	/// Forgets what was found in a folder of a group, and what is found elsewhere now.
+	void OnFolder(const std::string& i_rGroup, const boost::filesystem::path& i_rFolder);
 
 	const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
 	const std::shared_ptr<TesselPluginInterface::IJobRunner> m_pJobRunner;
