@@ -225,6 +225,32 @@ TEST_F(FolderWatcher, FollowsTheSystemsNotices)
 	EXPECT_TRUE(becomes({"d"}));
 }
 
+/// However a folder is spelled, and however its way appears.
+TEST_F(FolderWatcher, FollowsAWayThatAppearsStepByStep)
+{
+	const auto pParameter = MakeWatcher();
+	pParameter->AddFolder("Deep", m_Folder / "a/b", 1);
+	pParameter->AddFolder("Odd", m_Folder / "u/./../u", 1);
+	// Notices are real, so each step is taken when the one before is watched; the time only ends a test that would
+	// hang.
+	const auto noticed = [&] { return QTest::qWaitFor([&] { return m_Delay.Pass() > 0; }, 30000); };
+	for (const char* const pFolder : {"a", "a/b", "u"})
+	{
+		SCOPED_TRACE(pFolder);
+		create_directory(m_Folder / pFolder);
+		ASSERT_TRUE(noticed());
+	}
+	// At once, within one tick of the clock that dates folders.
+	Put(m_Folder / "a/b/first.qrs", "");
+	Put(m_Folder / "u/second.qrs", "");
+	const auto becomes = [&]
+	{
+		m_Delay.Pass();
+		return Names(*pParameter) == VTexts{"first", "second"};
+	};
+	EXPECT_TRUE(QTest::qWaitFor(becomes, 30000));
+}
+
 TEST_F(FolderWatcher, AStoredValueIsHeldAgainstTheFilesOnce)
 {
 	Put(m_Folder / "User/kept.qrs", "");

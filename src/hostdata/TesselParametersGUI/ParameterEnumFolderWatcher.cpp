@@ -84,8 +84,9 @@ void VParameterEnumFolderWatcher::OnDirectoryChanged(const QString& i_rFolder)
 	const bool bConcerns = std::any_of(m_Folders.begin(), m_Folders.end(),
 	    [&](const VWatchedFolder& i_rFolder)
 	    {
-		    return i_rFolder.m_Folder == changed
-		        || (!i_rFolder.m_Folder.empty() && Stamp(i_rFolder.m_Folder) != m_Stamps[i_rFolder.m_Folder]);
+		    return !i_rFolder.m_Folder.empty()
+		        && (UtilsFileSystem::Canonical(i_rFolder.m_Folder) == UtilsFileSystem::Canonical(changed)
+		            || Stamp(i_rFolder.m_Folder) != m_Stamps[i_rFolder.m_Folder]);
 	    });
 	if (bConcerns)
 		RefreshLater();
@@ -176,36 +177,40 @@ void VParameterEnumFolderWatcher::ClearVanishedValue(const VFolderState* i_pBefo
 
 void VParameterEnumFolderWatcher::Watch()
 {
-	std::set<QString> folders;
-	std::set<QString> wanted;
+	// A path that is watched may be another folder by now, and one folder under two names would count once for both.
+	if (const QStringList watched = m_pWatcher->directories(); !watched.isEmpty())
+		m_pWatcher->removePaths(watched);
+	std::set<boost::filesystem::path> wanted;
 	for (const VWatchedFolder& rFolder : m_Folders)
 	{
 		if (rFolder.m_Folder.empty())
 			continue;
-		const VStamp stamp = Stamp(rFolder.m_Folder);
-		if (std::exchange(m_Stamps[rFolder.m_Folder], stamp) != stamp)
-			m_pWatcher->removePath(ToQString(rFolder.m_Folder));
-		folders.insert(ToQString(rFolder.m_Folder));
+		m_Stamps[rFolder.m_Folder] = Stamp(rFolder.m_Folder);
 		for (boost::filesystem::path path = rFolder.m_Folder; !path.empty(); path = path.parent_path())
 			if (IsFolder(path))
-				wanted.insert(ToQString(path));
+				wanted.insert(UtilsFileSystem::Canonical(path));
 	}
-	for (const QString& rWatched : m_pWatcher->directories())
-		if (wanted.erase(rWatched) == 0)
-			m_pWatcher->removePath(rWatched);
-	for (const QString& rPath : wanted)
+	std::set<boost::filesystem::path> closed;
+	for (const boost::filesystem::path& rPath : wanted)
+		if (!m_pWatcher->addPath(ToQString(rPath)))
+			closed.insert(rPath);
+	for (const VWatchedFolder& rFolder : m_Folders)
 		// One above may be closed to this user.
-		if (!m_pWatcher->addPath(rPath) && folders.contains(rPath))
-			NVX_LOG("Tessel", NVX::ELogWarning, "Folder [%s] cannot be watched for changes", rPath.toStdString());
+		if (closed.contains(UtilsFileSystem::Canonical(rFolder.m_Folder)))
+			NVX_LOG("Tessel", NVX::ELogWarning, "Folder [%s] cannot be watched for changes",
+			    UtilsFileSystem::ToUtf8(rFolder.m_Folder));
 }
 
 VParameterEnumFolderWatcher::VStamp VParameterEnumFolderWatcher::Stamp(const boost::filesystem::path& i_rFolder)
 {
-	const QFileInfo info(ToQString(i_rFolder));
-	if (!info.isDir())
-		return {-1, -1};
-	const QDateTime made = info.birthTime();
-	return {made.isValid() ? made.toMSecsSinceEpoch() : 0, info.lastModified().toMSecsSinceEpoch()};
+	VStamp stamp{QFileInfo(ToQString(i_rFolder)).lastModified().toMSecsSinceEpoch()};
+	for (boost::filesystem::path path = i_rFolder; !path.empty(); path = path.parent_path())
+	{
+		const QFileInfo info(ToQString(path));
+		const QDateTime made = info.birthTime();
+		stamp.push_back(!info.isDir() ? -1 : made.isValid() ? made.toMSecsSinceEpoch() : 0);
+	}
+	return stamp;
 }
 
 } // namespace TesselParametersGUI

@@ -83,8 +83,9 @@ private:
 	VFolderState m_State;
 	/// Missed once, still offered.
 	std::set<std::string> m_Missed;
-	/// When each folder was made and last changed, to see that another one stands in its place.
-	using VStamp = std::pair<qint64, qint64>;
+	/// When a folder was last changed, and when it and each above it was made: to see that another one stands in its
+	/// place, or that the way to it has grown.
+	using VStamp = std::vector<qint64>;
 	static VStamp Stamp(const boost::filesystem::path& i_rFolder);
 	std::map<boost::filesystem::path, VStamp> m_Stamps;
 	bool m_bStarted = false;
