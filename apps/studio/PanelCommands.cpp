@@ -3,6 +3,7 @@
 #include "DebugServices/GlobalLog.h"
 #include "TesselPluginInterface/ITesselExecuteCommand.h"
 
+#include <QRegularExpression>
 #include <QWidget>
 
 namespace StudioHost
@@ -16,8 +17,10 @@ bool RunCommand(const QList<QWidget*>& i_rPanels, const QString& i_rCommand)
 		if (pCommands && pCommands->ExecuteCommand(i_rCommand.toStdString()))
 			return true;
 	}
-	NVX_LOG(
-	    "Command", NVX::ELogWarning, "Nothing happened: no panel knows the command \"%1%\"", i_rCommand.toStdString());
+	// "Workspace3d:FrameSelected" as words.
+	QString name = i_rCommand.section(':', -1);
+	name.replace(QRegularExpression(QStringLiteral("(?<=[a-z])(?=[A-Z])")), QStringLiteral(" "));
+	NVX_LOG("Command", NVX::ELogWarning, "%1%: No panel is open that can do this.", name.toStdString());
 	return false;
 }
 

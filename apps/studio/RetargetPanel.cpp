@@ -14,6 +14,9 @@
 #include <QQuickWidget>
 #include <QQuickWindow>
 
+#include <algorithm>
+#include <utility>
+
 namespace StudioHost
 {
 namespace
@@ -25,6 +28,12 @@ constexpr const char* c_pParameterGroup = "Subject";
 constexpr const char* c_pCurrentFile = "currentTargetSubjectURL";
 constexpr const char* c_pSource = "SourceSkeleton";
 constexpr const char* c_pFbx = "TargetFBX";
+
+/// What the operator pressed, by the document's command.
+constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubject", "Create Target Subject"},
+    {"LoadTargetSubjectURL", "Load"}, {"SaveTargetSubjectURL", "Save"}, {"AddTarget", "Add target"},
+    {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"},
+    {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"UpdateTargets", "Update targets"}};
 
 /// By objectName, of what can be seen.
 const QQuickItem* ItemNamed(const QQuickItem& i_rItem, const QString& i_rName)
@@ -179,7 +188,10 @@ bool VRetargetPanel::HasUnsavedChanges() const
 
 void VRetargetPanel::TellIgnored(const QString& i_rCommand, const QString& i_rReason)
 {
-	NVX_LOG("Command", NVX::ELogWarning, "%1% did nothing: %2%", i_rCommand.toStdString(), i_rReason.toStdString());
+	const auto found =
+	    std::ranges::find(c_Buttons, i_rCommand, [](const auto& i_rRow) { return QString(i_rRow.first); });
+	const QString name = found == std::end(c_Buttons) ? i_rCommand : found->second;
+	NVX_LOG("Command", NVX::ELogWarning, "%1%: %2%", name.toStdString(), i_rReason.toStdString());
 }
 
 void VRetargetPanel::TellLoaded(const QUrl& i_rUrl)

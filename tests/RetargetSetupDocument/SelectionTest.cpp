@@ -61,15 +61,16 @@ TEST_F(Selection, FollowsTheHostRows)
 		std::vector<ISelectionItem> m_Items;
 		const char* m_pExpected;
 		int m_Changes;
+		std::array<int, 3> m_Counts;
 	} rows[] = {
-	    {"one source segment", {Item(11, 2)}, "2 -1 -1", 1},
-	    {"a pair for a target", {Item(11, 2), Item(14, 7)}, "2 7 -1", 1},
-	    {"all three at once are told once", {Item(16, 1), Item(14, 3), Item(11, 0)}, "0 3 1", 1},
-	    {"two source segments are none", {Item(11, 2), Item(11, 3), Item(14, 7)}, "-1 7 -1", 1},
-	    {"three are none, too", {Item(16, 2), Item(16, 3), Item(16, 4)}, "-1 -1 -1", 1},
-	    {"another subject does not count", {Item(11, 2), Item(11, 5, 9), Item(14, 1, 9)}, "2 -1 -1", 1},
-	    {"other kinds tell nothing", {Item(28, 2), Item(11, 2), Item(7, 0)}, "2 -1 -1", 0},
-	    {"nothing", {}, "-1 -1 -1", 1},
+	    {"one source segment", {Item(11, 2)}, "2 -1 -1", 1, {1, 0, 0}},
+	    {"a pair for a target", {Item(11, 2), Item(14, 7)}, "2 7 -1", 1, {1, 1, 0}},
+	    {"all three at once are told once", {Item(16, 1), Item(14, 3), Item(11, 0)}, "0 3 1", 1, {1, 1, 1}},
+	    {"two source segments are none", {Item(11, 2), Item(11, 3), Item(14, 7)}, "-1 7 -1", 1, {2, 1, 0}},
+	    {"three are none, too", {Item(16, 2), Item(16, 3), Item(16, 4)}, "-1 -1 -1", 1, {0, 0, 3}},
+	    {"another subject does not count", {Item(11, 2), Item(11, 5, 9), Item(14, 1, 9)}, "2 -1 -1", 1, {1, 0, 0}},
+	    {"other kinds tell nothing", {Item(28, 2), Item(11, 2), Item(7, 0)}, "2 -1 -1", 0, {1, 0, 0}},
+	    {"nothing", {}, "-1 -1 -1", 1, {0, 0, 0}},
 	};
 	for (const auto& rRow : rows)
 	{
@@ -79,6 +80,9 @@ TEST_F(Selection, FollowsTheHostRows)
 		m_Host.Dispatcher().RunPending();
 		EXPECT_EQ(Text(*m_pSelection), rRow.m_pExpected) << rRow.m_pName;
 		EXPECT_EQ(m_Changes, rRow.m_Changes) << rRow.m_pName;
+		const std::array<int, 3> counts{m_pSelection->property("sourceSegmentCount").toInt(),
+		    m_pSelection->property("targetSegmentCount").toInt(), m_pSelection->property("targetCount").toInt()};
+		EXPECT_EQ(counts, rRow.m_Counts) << rRow.m_pName;
 	}
 	m_Host.SelectionManager().PreSelection().Add({Item(11, 1)});
 	EXPECT_EQ(m_Host.Dispatcher().PendingCount(), 0u) << "pointing selects nothing";

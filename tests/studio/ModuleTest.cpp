@@ -76,7 +76,7 @@ TEST(Modules, LiveInAWindow)
 
 	EXPECT_TRUE(window.Execute("Workspace3d:FrameSelected"));
 	EXPECT_FALSE(window.Execute("Workspace3d:frameselected"));
-	EXPECT_EQ(messages.Take(), "3 Command: Nothing happened: no panel knows the command \"Workspace3d:frameselected\"");
+	EXPECT_EQ(messages.Take(), "3 Command: frameselected: No panel is open that can do this.");
 	window.Context().Preferences().SetFolder("FolderSkins", "/skins");
 	RunEvents();
 	// On its way when the module is unloaded.

@@ -95,7 +95,7 @@ TEST_F(Program, FailsWithItsReason)
 		const char* m_pMessage;
 	} rows[] = {
 	    {Picture({"--fbx", Path("none.fbx")}), 3, "error Import: .*/none.fbx does not exist\n"},
-	    {Picture({broken}), 3, "warning Command: LoadTargetSubjectURL did nothing: "},
+	    {Picture({broken}), 3, "warning Command: Load: "},
 	    {Picture({"--module", broken}), 3, "error System: No module is loaded: .*broken.qrr is no library"},
 	    {Picture({}, "none/picture.png"), 4, "error System: .*none/picture.png"},
 	};

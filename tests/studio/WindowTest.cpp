@@ -146,7 +146,7 @@ TEST_F(Window, TakesDroppedFilesByKind)
 
 	// What cannot be loaded is told, and never becomes the file that is saved to.
 	EXPECT_TRUE(Drop({broken}));
-	EXPECT_NE(m_Messages.Take().find("Command: LoadTargetSubjectURL did nothing: "), std::string::npos);
+	EXPECT_NE(m_Messages.Take().find("Command: Load: "), std::string::npos);
 	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));
 	EXPECT_TRUE(Drop({Path("gone.fbx")}));
 	EXPECT_EQ(m_Messages.Take(), "2 Import: " + Path("gone.fbx").toStdString() + " does not exist");
@@ -191,7 +191,7 @@ TEST_F(Window, ExplainsSilentCommands)
 	QMetaObject::invokeMethod(pPanel->contextProperty("ContextRetargetSetup").value<QObject*>(), "CreateTargetSubject");
 	RunEvents();
 	const std::string message = m_Messages.Take();
-	EXPECT_EQ(message.find("3 Command: CreateTargetSubject did nothing: "), 0u) << message;
+	EXPECT_EQ(message.find("3 Command: Create Target Subject: No skeleton has been read"), 0u) << message;
 	const QAbstractItemModel& rLog = m_pWindow->Log();
 	const int last = rLog.rowCount() - 1;
 	EXPECT_EQ(rLog.index(last, StudioHost::VLogModel::ECategory).data().toString(), "Command");
@@ -204,7 +204,7 @@ TEST_F(Window, SaysWhyThereIsNoPanel)
 	EXPECT_TRUE(rNotice.isVisible());
 	EXPECT_EQ(rNotice.text(), "No module is loaded: " + Path("None.so") + " does not exist");
 	Action("FrameSelected").trigger();
-	EXPECT_NE(m_Messages.Take().find("no panel knows the command"), std::string::npos);
+	EXPECT_NE(m_Messages.Take().find("Command: Frame Selected: No panel is open"), std::string::npos);
 }
 
 TEST_F(Window, KeepsItsLayout)

@@ -121,6 +121,16 @@ TEST_F(Job, SelectsWithMouseAndKeys)
 		EXPECT_EVENTUALLY(selected() == 3);
 		rOperator.ClickRow(rList, 5, Qt::ControlModifier);
 		EXPECT_EVENTUALLY(selected() == -1) << "two are selected";
+		const auto told = [&] { return rOperator.Property("status", "text").toString(); };
+		for (const auto& [pButton, rReason] : {std::pair("removeTarget", QString("No target is selected: select one.")),
+		         {"save", "No retarget subject was loaded or saved yet: use Save As."},
+		         {"addPositionTarget",
+		             rList == "sourceSegments" ? "2 source segments are selected: select only one."
+		                                       : "2 target segments are selected: select only one."}})
+		{
+			rOperator.Hover(pButton);
+			EXPECT_EVENTUALLY(told() == rReason);
+		}
 		rOperator.ClickRow(rList, 3, Qt::ControlModifier);
 		EXPECT_EVENTUALLY(selected() == 5);
 		const std::pair<Qt::Key, int> keys[] = {{Qt::Key_Down, 6}, {Qt::Key_Up, 5}, {Qt::Key_End, last},

@@ -9,19 +9,7 @@
 namespace
 {
 
-/// -1 unless exactly one item of the kind belongs to the document.
-std::int32_t OnlySelected(const TesselPluginInterface::ISelection& i_rSelection, NVX::ESelectionKind i_Kind)
-{
-	std::int32_t selected = -1;
-	for (const NVX::ISelectionItem& rItem : i_rSelection.ItemsOfKind(i_Kind))
-		if (rItem.m_SubjectId == RetargetSetup::c_SubjectId)
-		{
-			if (selected != -1)
-				return -1;
-			selected = std::int32_t(rItem.m_ElementIndex);
-		}
-	return selected;
-}
+constexpr std::array c_Kinds{NVX::ESelectionSourceSegment, NVX::ESelectionTargetSegment, NVX::ESelectionTarget};
 
 } // namespace
 
@@ -39,8 +27,14 @@ void VRetargetSetupSelection::OnShared()
 void VRetargetSetupSelection::Update()
 {
 	const TesselPluginInterface::ISelection& rSelection = m_pSelectionManager->Selection();
-	const std::array<std::int32_t, 3> selected{OnlySelected(rSelection, NVX::ESelectionSourceSegment),
-	    OnlySelected(rSelection, NVX::ESelectionTargetSegment), OnlySelected(rSelection, NVX::ESelectionTarget)};
+	std::array<std::int32_t, 3> selected{-1, -1, -1};
+	std::array<std::int32_t, 3> counts{};
+	for (std::size_t i = 0; i < c_Kinds.size(); ++i)
+		for (const NVX::ISelectionItem& rItem : rSelection.ItemsOfKind(c_Kinds[i]))
+			if (rItem.m_SubjectId == RetargetSetup::c_SubjectId)
+				selected[i] = ++counts[i] == 1 ? std::int32_t(rItem.m_ElementIndex) : -1;
+	if (std::exchange(m_Counts, counts) != counts)
+		emit countsChanged();
 	if (std::exchange(m_Selected, selected) != selected)
 		emit Changed();
 }

@@ -23,6 +23,10 @@ class VRetargetSetupSelection : public QObject, public NVX::VShared
 	Q_PROPERTY(int selectedSourceSegment READ SelectedSourceSegment WRITE SetSelectedSourceSegment NOTIFY Changed)
 	Q_PROPERTY(int selectedTargetSegment READ SelectedTargetSegment WRITE SetSelectedTargetSegment NOTIFY Changed)
 	Q_PROPERTY(int selectedTarget READ SelectedTarget WRITE SetSelectedTarget NOTIFY Changed)
+	/// How many of each are selected: what an index of -1 means.
+	Q_PROPERTY(int sourceSegmentCount READ SourceSegmentCount NOTIFY countsChanged)
+	Q_PROPERTY(int targetSegmentCount READ TargetSegmentCount NOTIFY countsChanged)
+	Q_PROPERTY(int targetCount READ TargetCount NOTIFY countsChanged)
 
 public:
 	VRetargetSetupSelection(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
@@ -32,6 +36,10 @@ public:
 	std::int32_t SelectedTargetSegment() const { return m_Selected[1]; }
 	std::int32_t SelectedTarget() const { return m_Selected[2]; }
 
+	std::int32_t SourceSegmentCount() const { return m_Counts[0]; }
+	std::int32_t TargetSegmentCount() const { return m_Counts[1]; }
+	std::int32_t TargetCount() const { return m_Counts[2]; }
+
 	/// These change what this object tells, and not the host's selection; its next change overrides them.
 	void SetSelectedSourceSegment(std::int32_t i_Index) { Set(0, i_Index); }
 	void SetSelectedTargetSegment(std::int32_t i_Index) { Set(1, i_Index); }
@@ -39,6 +47,7 @@ public:
 
 signals:
 	void Changed();
+	void countsChanged();
 
 protected:
 	void OnShared() override;
@@ -51,4 +60,5 @@ private:
 	const std::shared_ptr<TesselPluginInterface::ISelectionManager> m_pSelectionManager;
 	/// Source segment, target segment, target.
 	std::array<std::int32_t, 3> m_Selected{-1, -1, -1};
+	std::array<std::int32_t, 3> m_Counts{};
 };

@@ -20,6 +20,13 @@ Rectangle {
 	property var targetParametersModel: TesselParameters.ParameterGroupModel("RetargetSetup", "Target")
 	property bool canAddTarget: RetargetSetupSelection.selectedSourceSegment !== -1
 		&& RetargetSetupSelection.selectedTargetSegment !== -1
+	// Why no target can be added, and what to do.
+	readonly property string addTargetReason: canAddTarget ? ""
+		: sourceSegments.count === 0 ? "There is no performer: choose a source skeleton."
+		: targetSegments.count === 0 ? "There is no character: choose a target FBX, then create the target subject."
+		: countReason(RetargetSetupSelection.sourceSegmentCount, "source segment")
+		|| countReason(RetargetSetupSelection.targetSegmentCount, "target segment")
+	readonly property string targetReason: countReason(RetargetSetupSelection.targetCount, "target")
 	// What "Save" writes: the file that was last loaded or saved.
 	property var currentTargetSubjectURL: null
 
@@ -29,6 +36,16 @@ Rectangle {
 
 	Accessible.role: Accessible.Pane
 	Accessible.name: "Retarget Setup"
+
+	// Why it is not exactly one that is selected; empty if it is.
+	function countReason(count, what) {
+		return count === 0 ? "No " + what + " is selected: select one."
+			: count > 1 ? count + " " + what + "s are selected: select only one." : ""
+	}
+
+	function segmentName(model, index) {
+		return model.data(model.index(index, 0), RetargetSetupSegmentModel.Name)
+	}
 
 	function addTarget(positionTarget) {
 		ContextRetargetSetup.AddTarget(RetargetSetupSelection.selectedSourceSegment,
@@ -64,8 +81,28 @@ Rectangle {
 		function onTargetSubjectLoaded(url) {
 			retargetSetup.currentTargetSubjectURL = url
 		}
+		function onCommandIgnored(command, reason) {
+			status.told = reason
+		}
+	}
+	Connections {
+		target: RetargetSetupSelection
+		function onCountsChanged() {
+			status.told = ""
+		}
+	}
+	Connections {
+		target: TargetSegmentModel
+		function onModelReset() {
+			status.told = ""
+		}
 	}
 
+	Shortcut {
+		sequences: ["Alt+T", "Alt+R"]
+		enabled: !retargetSetup.canAddTarget
+		onActivated: status.told = retargetSetup.addTargetReason
+	}
 	Shortcut {
 		sequence: "Alt+T"
 		enabled: retargetSetup.canAddTarget
@@ -123,6 +160,14 @@ Rectangle {
 			SplitView.minimumWidth: leftColumn.minimumWidth
 			SplitView.preferredWidth: leftColumn.minimumWidth
 
+			// A disabled control lets the mouse through.
+			MouseArea {
+				id: behind
+				anchors.fill: parent
+				hoverEnabled: true
+				acceptedButtons: Qt.NoButton
+			}
+
 			ColumnLayout {
 				id: leftColumn
 
@@ -170,6 +215,7 @@ Rectangle {
 						text: "Save"
 						toolTip: "Save the current retarget skeleton to the last filename"
 						enabled: !!retargetSetup.currentTargetSubjectURL
+						readonly property string disabledReason: "No retarget subject was loaded or saved yet: use Save As."
 						onClicked: retargetSetup.save()
 					}
 					OrlexButton {
@@ -219,6 +265,7 @@ Rectangle {
 						text: "Add position target"
 						toolTip: "Add a world-space position target for the selected segments. Shortcut: Alt+T"
 						enabled: retargetSetup.canAddTarget
+						readonly property string disabledReason: retargetSetup.addTargetReason
 						onClicked: retargetSetup.addTarget(true)
 					}
 					OrlexButton {
@@ -227,6 +274,7 @@ Rectangle {
 						text: "Add rotation target"
 						toolTip: "Add a world-space rotation target for the selected segments. Shortcut: Alt+R"
 						enabled: retargetSetup.canAddTarget
+						readonly property string disabledReason: retargetSetup.addTargetReason
 						onClicked: retargetSetup.addTarget(false)
 					}
 					OrlexCheckBox {
@@ -265,6 +313,7 @@ Rectangle {
 					text: "Remove target"
 					toolTip: "Delete the selected target"
 					enabled: RetargetSetupSelection.selectedTarget !== -1
+					readonly property string disabledReason: retargetSetup.targetReason
 					onClicked: ContextRetargetSetup.RemoveTarget(RetargetSetupSelection.selectedTarget)
 				}
 
@@ -276,6 +325,7 @@ Rectangle {
 
 					objectName: "targetParameters"
 					Layout.fillWidth: true
+					readonly property string disabledReason: retargetSetup.targetReason
 					enabled: shownTarget !== -1
 					model: retargetSetup.targetParametersModel
 					onShownTargetChanged: restore()
@@ -376,6 +426,19 @@ Rectangle {
 				SceneToolTip {
 					scene: sceneFBO
 				}
+			}
+
+			RetargetSetupStatus {
+				id: status
+				objectName: "status"
+				Layout.fillWidth: true
+				page: left
+				place: Qt.point(behind.mouseX, behind.mouseY)
+				pointing: behind.containsMouse
+				next: retargetSetup.addTargetReason || "Alt+T ties "
+					+ segmentName(TargetSegmentModel, RetargetSetupSelection.selectedTargetSegment) + " to "
+					+ segmentName(SourceSegmentModel, RetargetSetupSelection.selectedSourceSegment)
+					+ " by position, Alt+R by rotation."
 			}
 		}
 
