@@ -43,8 +43,14 @@ EExitStatus Convert(const VConvertSettings& i_rSettings)
 	CheckKind(i_rSettings);
 	const VSubjectFile file = ReadSubjectFile(i_rSettings.m_In);
 	const CoreOrlexTypes::VSubjectRecord& rRecord = file.m_Record;
-	const auto losses = CoreOrlexQRTIO::ListVersionLosses(
+	const auto [losses, refusal] = CoreOrlexQRTIO::ListVersionLosses(
 	    rRecord.m_SubjectParametrised, rRecord.m_SubjectApplicationData, file.m_Extras, i_rSettings.m_Version);
+	if (!refusal.empty() && !i_rSettings.m_Out.m_bForce)
+		throw VCommandError(EBadOutput,
+		    "\"" + i_rSettings.m_Out.m_Path + "\" is not written, since nobody could read it again (" + refusal
+		        + "): mend \"" + i_rSettings.m_In + "\", or give --force");
+	if (!refusal.empty())
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "Nobody can read \"%1%\" again: %2%", i_rSettings.m_Out.m_Path, refusal);
 	if (!losses.empty())
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "Version %1% of the format cannot hold: %2%", i_rSettings.m_VersionText,
 		    boost::algorithm::join(losses, ", "));
@@ -67,6 +73,8 @@ VCommand AddConvertCommand(CLI::App& io_rProgram)
 	        "Where the skeleton file is written; may be IN itself, - is standard output")
 	    ->required();
 	AddForceOption(*pApp, pSettings->m_Out);
+	pApp->get_option("--force")->description(
+	    "Replace a file of another kind that stands where is written, and write what nobody can read again");
 	pApp->add_option_function<std::string>(
 	        "--format-version",
 	        [pSettings](const std::string& i_rText)

@@ -204,8 +204,10 @@ TEST_P(FrozenFile, ComesBackEqualAtItsOwnVersion)
 	EXPECT_EQ(again.m_Warnings, c_WrittenFileWarnings);
 	ExpectSame(m_Content, again);
 	EXPECT_TRUE(WriteText(again, m_VersionValue) == first);
-	EXPECT_EQ(ListVersionLosses(m_Content.m_Subject, m_Content.m_ApplicationData, m_Content.m_Extras, m_VersionValue),
-	    VTexts());
+	const auto [losses, refusal] =
+	    ListVersionLosses(m_Content.m_Subject, m_Content.m_ApplicationData, m_Content.m_Extras, m_VersionValue);
+	EXPECT_EQ(losses, VTexts());
+	EXPECT_EQ(refusal, "");
 }
 
 /// What a subject of 3.5 becomes at this version can be read again, and is stable from then on.
@@ -241,7 +243,8 @@ TEST(Versions, NothingIsLostOfElementsThatShareTheirIdentity)
 	const auto losses = [&]
 	{
 		return ListVersionLosses(
-		    content.m_Subject, content.m_ApplicationData, content.m_Extras, VersionValueFromText("3.5").value());
+		    content.m_Subject, content.m_ApplicationData, content.m_Extras, VersionValueFromText("3.5").value())
+		    .m_Losses;
 	};
 	auto& rTargets = content.m_Subject.m_Targets;
 	for (int i = 0; i < 20; ++i)
@@ -261,7 +264,8 @@ TEST(Versions, LossesAreCounted)
 	const auto losses = [&](const char* i_pVersion)
 	{
 		return ListVersionLosses(
-		    content.m_Subject, content.m_ApplicationData, content.m_Extras, VersionValueFromText(i_pVersion).value());
+		    content.m_Subject, content.m_ApplicationData, content.m_Extras, VersionValueFromText(i_pVersion).value())
+		    .m_Losses;
 	};
 	EXPECT_EQ(losses("3.5"), VTexts());
 	EXPECT_EQ(losses("3.4"),

@@ -215,6 +215,8 @@ const VRow c_Rows[] = {
 	        c.m_Extras.m_DynamicSubspaces.push_back({"limb", "1", {"j"}, {1, 2}, {}});
         },
         {}, {"Dynamic subspace 'limb' does not fit the joints any more: it is not written."}},
+    {"LargerThanAnyThatIsRead", [](VContent& c) { c.m_Subject.m_Model.assign(std::size_t(32) << 20, 'x'); },
+        {"The file would be larger than the 33554432 bytes that are read at most."}},
     {"ChainTooDeep",
         [](VContent& c)
         {

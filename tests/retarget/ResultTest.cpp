@@ -283,6 +283,22 @@ TEST(Convert, WritesAnyVersionAndTellsWhatItLoses)
 	EXPECT_EQ(folder.Run({"convert", "same.qrs", "same.qrs"}).m_Status, 0);
 	EXPECT_EQ(text.m_Out, folder.Read("same.qrs")) << "onto itself";
 	EXPECT_EQ(folder.Names(), (std::vector<std::string>{"old.qrs", "same.qrs"}));
+
+	folder.Write("broken.qrx",
+	    "{\"Version\":[1,0,1],\"Schema\":\"Retarget\"}\n"
+	    "{\"SubjectParametrised\":{\"Segments\":[{\"Name\":\"a\",\"Bounds\":[\"x\",\"0\",\"0\",\"0\",\"0\",\"0\"]}]}}");
+	const VRun refused = folder.Run({"convert", "broken.qrx", "broken.qrr"});
+	EXPECT_EQ(refused.m_Status, 4);
+	EXPECT_NE(
+	    refused.m_Err.find("error retarget: \"broken.qrr\" is not written, since nobody could read it again (Parse "
+	                       "Error at column 2: ID \"x\" was referenced but never declared): mend "),
+	    std::string::npos)
+	    << refused.m_Err;
+	EXPECT_EQ(folder.Names().size(), 3u);
+	const VRun forced = folder.Run({"convert", "broken.qrx", "broken.qrr", "--force"});
+	EXPECT_EQ(forced.m_Status, 0);
+	EXPECT_NE(forced.m_Err.find("warning retarget: Nobody can read \"broken.qrr\" again: Parse"), std::string::npos);
+	EXPECT_EQ(folder.Run({"dump", "broken.qrr"}).m_Status, 3);
 }
 
 TEST(Schema, ToFileAndStandardOutput)

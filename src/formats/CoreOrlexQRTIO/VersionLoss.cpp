@@ -338,7 +338,7 @@ void AddParameters(const VContent& i_rBefore, const VContent& i_rAfter, VLosses&
 
 } // namespace
 
-std::vector<std::string> ListVersionLosses(const VSubjectParametrised& i_rSubject,
+VVersionLosses ListVersionLosses(const VSubjectParametrised& i_rSubject,
     const VSubjectApplicationData& i_rApplicationData, const VSubjectQRTExtras& i_rExtras, std::uint32_t i_VersionValue)
 {
 	std::string text;
@@ -347,11 +347,11 @@ std::vector<std::string> ListVersionLosses(const VSubjectParametrised& i_rSubjec
 	if (!VWriter().WriteText(i_rSubject, i_rApplicationData, i_rExtras, i_VersionValue, text, errors, warnings))
 		return {};
 	VContent after;
-	VLosses losses;
 	if (!VReader().ReadText(std::move(text), i_rSubject.m_Name, i_rSubject.m_SubjectId, after.m_Subject,
 	        after.m_ApplicationData, after.m_Extras, errors, warnings))
-		losses.m_Texts.push_back("the ability to be read again (" + errors.front() + ")");
+		return {{}, errors.front()};
 
+	VLosses losses;
 	const VContent before{i_rSubject, i_rApplicationData, i_rExtras};
 	losses.AddIf(i_rSubject.m_ModelVersion != after.m_Subject.m_ModelVersion, "the model version");
 	losses.AddIf(i_rApplicationData.m_RetargetSourceTemplate != after.m_ApplicationData.m_RetargetSourceTemplate,
@@ -368,7 +368,7 @@ std::vector<std::string> ListVersionLosses(const VSubjectParametrised& i_rSubjec
 	AddTargets(before, after, losses);
 	if (after.m_Extras.m_DynamicSubspaces.size() < i_rExtras.m_DynamicSubspaces.size())
 		losses.Add(i_rExtras.m_DynamicSubspaces.size() - after.m_Extras.m_DynamicSubspaces.size(), "dynamic subspace");
-	return losses.m_Texts;
+	return {std::move(losses.m_Texts), {}};
 }
 
 } // namespace CoreOrlexQRTIO

@@ -5,6 +5,7 @@
 #include "CoreOrlexQRTIO/ExpressionList.h"
 #include "CoreOrlexQRTIO/FormatTable.h"
 #include "CoreOrlexQRTIO/FormatVersions.h"
+#include "CoreOrlexQRTIO/Limits.h"
 #include "CoreOrlexQRTIO/WriteSections.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypesUtils/StaticExpressionParser.h"
@@ -226,6 +227,13 @@ bool VWriter::WriteText(const VSubjectParametrised& i_rSubject, const VSubjectAp
 		o_rErrors = root.GetGlobalInfo()->m_Errors.GetTexts();
 		if (o_rErrors.empty())
 			o_rText = document.Print();
+		if (o_rText.size() > c_MaximumFileSize)
+		{
+			o_rErrors.push_back((
+			    boost::format("The file would be larger than the %1% bytes that are read at most.") % c_MaximumFileSize)
+			                        .str());
+			o_rText.clear();
+		}
 	}
 	o_rWarnings = std::move(writing.m_Warnings);
 	return o_rErrors.empty();
