@@ -65,6 +65,28 @@ TEST(Reader, OddFormsAreRead)
 	}
 }
 
+TEST_P(Reader, RotationSpaceMayBeForLimitsOnly)
+{
+	using VProperties = std::vector<std::pair<std::string, VNumbers>>;
+	const VProperties plain{{"Lcl Rotation", {10, 20, 30}}};
+	VProperties space = plain;
+	space.insert(space.end(),
+	    {{"RotationActive", {1}}, {"RotationOrder", {4}}, {"PreRotation", {0, 90, 0}}, {"PostRotation", {45, 0, 0}}});
+	VProperties limits = space;
+	space.push_back({"RotationSpaceForLimitOnly", {0}});
+	limits.push_back({"RotationSpaceForLimitOnly", {1}});
+	const VLoaded file(Write(GetParam(),
+	    Bones(
+	        {{"plain", "LimbNode", -1, plain}, {"space", "LimbNode", -1, space}, {"limits", "LimbNode", -1, limits}})));
+	const VSkinSkeleton& rBones = *file.m_Reader.GetSkeleton();
+	ASSERT_EQ(rBones.size(), 3u);
+	EXPECT_NE(rBones[1].m_Global, rBones[0].m_Global);
+	EXPECT_FALSE(rBones[1].m_PreRotation.isIdentity());
+	EXPECT_EQ(rBones[2].m_Global, rBones[0].m_Global);
+	EXPECT_EQ(rBones[2].m_Local, rBones[0].m_Local);
+	EXPECT_TRUE(rBones[2].m_PreRotation.isIdentity());
+}
+
 TEST(Reader, WhatIsNoPlainFileIsNotFound)
 {
 	for (const std::string& rPath :

@@ -8,7 +8,7 @@ namespace
 VMatrix3 LocalRotation(const FbxFormat::VNodeTransform& i_rNode)
 {
 	using FbxFormat::ERotationOrder;
-	if (!i_rNode.m_bRotationActive)
+	if (!i_rNode.HasRotationSpace())
 		return FbxFormat::EulerRotation(i_rNode.m_Rotation, ERotationOrder::XYZ);
 	const VMatrix3 pre = FbxFormat::EulerRotation(i_rNode.m_PreRotation, ERotationOrder::XYZ);
 	const VMatrix3 post = FbxFormat::EulerRotation(i_rNode.m_PostRotation, ERotationOrder::XYZ);

@@ -29,8 +29,12 @@ struct VNodeTransform
 	Rotation::VVector3 m_PostRotation{};
 	ERotationOrder m_Order = ERotationOrder::XYZ;
 	EInheritType m_InheritType = EInheritType::RrSs;
-	/// Off: pre- and post-rotation count as zero and the order as XYZ.
 	bool m_bRotationActive = false;
+	/// Pre- and post-rotation and order are those of the limits of the rotation only.
+	bool m_bRotationSpaceForLimitOnly = false;
+
+	/// False: pre- and post-rotation count as zero and the order as XYZ.
+	bool HasRotationSpace() const { return m_bRotationActive && !m_bRotationSpaceForLimitOnly; }
 };
 
 struct VLocalTransform

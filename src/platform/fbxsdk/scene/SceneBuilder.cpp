@@ -41,6 +41,11 @@ void ReadEnum(VValueCursor& io_rCursor, TEnum i_Last, TEnum& io_rValue)
 	io_rValue = number >= 0 && number <= std::int64_t(i_Last) ? TEnum(number) : TEnum(0);
 }
 
+void ReadFlag(VValueCursor& io_rCursor, bool& io_rbValue)
+{
+	io_rbValue = io_rCursor.Next().AsInteger(io_rbValue) != 0;
+}
+
 /// What the record does not tell stays as it is.
 void ReadTransform(const VElementTree& i_rTree, VElementIndex i_Object, VNodeTransform& io_rTransform)
 {
@@ -59,7 +64,9 @@ void ReadTransform(const VElementTree& i_rTree, VElementIndex i_Object, VNodeTra
 		    else if (i_Name == "InheritType")
 			    ReadEnum(io_rCursor, EInheritType::Rrs, io_rTransform.m_InheritType);
 		    else if (i_Name == "RotationActive")
-			    io_rTransform.m_bRotationActive = io_rCursor.Next().AsInteger(io_rTransform.m_bRotationActive) != 0;
+			    ReadFlag(io_rCursor, io_rTransform.m_bRotationActive);
+		    else if (i_Name == "RotationSpaceForLimitOnly")
+			    ReadFlag(io_rCursor, io_rTransform.m_bRotationSpaceForLimitOnly);
 	    });
 }
 

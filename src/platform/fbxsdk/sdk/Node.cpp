@@ -78,7 +78,7 @@ fbxsdk::FbxSurfaceMaterial* fbxsdk::FbxNode::GetMaterial(int pIndex) const
 fbxsdk::FbxVector4 fbxsdk::FbxNode::GetPreRotation(EPivotSet pPivotSet) const
 {
 	const FbxFormat::VNodeTransform& rProperties = m_pData->m_Properties;
-	if (pPivotSet != eSourcePivot || !rProperties.m_bRotationActive)
+	if (pPivotSet != eSourcePivot || !rProperties.HasRotationSpace())
 		return {};
 	const auto& [x, y, z] = rProperties.m_PreRotation;
 	return {x, y, z};

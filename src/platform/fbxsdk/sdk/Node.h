@@ -96,7 +96,7 @@ public:
 	int GetMaterialCount() const;
 	FbxSurfaceMaterial* GetMaterial(int pIndex) const;
 
-	/// In degrees, order XYZ; zero where the node's flag turns it off. Files have no destination pivots.
+	/// In degrees, order XYZ; zero where the node's flags turn it off. Files have no destination pivots.
 	FbxVector4 GetPreRotation(EPivotSet pPivotSet) const;
 
 	/// Relative to the parent, in file units.
