@@ -204,7 +204,7 @@ const VHostileRow c_Rows[]{
         {}},
     {"TextRecordsAHundredThousandDeep",
         [] { return WithLines(Repeated(100'000, [](std::size_t) { return "Model: {"s; }), {}); },
-        {false, 0, 0, 0, "its records lie too deep in one another"}},
+        {false, 0, 0, 0, "its records lie more than 64 deep in one another"}},
     {"BinaryRecordsTwoThousandDeep",
         []
         {
@@ -219,7 +219,7 @@ const VHostileRow c_Rows[]{
 	        records.push_back(std::move(record));
 	        return Write(c_Forms[1], records);
         },
-        {false, 2, 1, 1, "its records lie too deep in one another"}},
+        {false, 2, 1, 1, "its records lie more than 64 deep in one another"}},
     {"NodesFiftyFiveThousandDeep",
         []
         {

@@ -26,6 +26,7 @@ struct VResult
 	bool m_bInitialized;
 	bool m_bComplete;
 	int m_Nodes;
+	std::string m_Reason;
 };
 
 /// Imports and evaluates everything.
@@ -33,7 +34,7 @@ VResult Load(const std::string& i_rBytes)
 {
 	const VTestLog quiet("FBXIO");
 	VImported file(i_rBytes);
-	VResult result{file.m_bInitialized, file.m_bImported, 0};
+	VResult result{file.m_bInitialized, file.m_bImported, 0, file.m_pImporter->GetStatus().GetErrorString()};
 	std::vector<FbxNode*> open{file.Root()};
 	while (!open.empty())
 	{
@@ -64,30 +65,44 @@ TEST(Damage, AMillionBytesOfAnythingAreReadInOneGo)
 	EXPECT_FALSE(Load(binary + repeat("\1"s + std::string(12, '\0'))).m_bComplete);
 }
 
-/// More than is kept is left out and told; what was kept is whole.
+/// More than is kept is left out, and the limit is named; what was kept is whole.
 TEST(Damage, ListsAreBounded)
 {
+	namespace Limits = FbxFormat::Limits;
+	const auto objects = [](std::size_t i_Count, const char* i_pObject)
+	{ return c_Head + "Objects: {\n" + Repeated(i_Count, i_pObject) + "}\nConnections: {\n}\n"; };
+	const auto isBeyond = [](const std::string& i_rBytes, const std::string& i_rWhat)
+	{
+		const VResult result = Load(i_rBytes);
+		EXPECT_EQ(result.m_Reason.substr(0, result.m_Reason.find(" (byte ")),
+		    result.m_bComplete ? "" : "File holds more than is read: it has more than " + i_rWhat);
+		return !result.m_bComplete;
+	};
+	const std::tuple<std::size_t, const char*, const char*> rows[]{
+	    {Limits::c_Nodes, "Model: 7,\"Model::a\",\"Null\"\n", " nodes"},
+	    {Limits::c_Parts, "Video: 7,\"\"\n", " materials, textures, pictures, meshes and skins"},
+	    {Limits::c_Clusters, "Deformer: 7,\"\",\"Cluster\"\n", " clusters of skins"},
+	    {Limits::c_Objects, "Pose: 7,\"\"\n", " objects"}};
+	for (const auto& [limit, pObject, pWhat] : rows)
+	{
+		EXPECT_FALSE(isBeyond(objects(limit, pObject), std::to_string(limit) + pWhat));
+		EXPECT_TRUE(isBeyond(objects(limit + 1, pObject), std::to_string(limit) + pWhat));
+	}
+	// The root and the two sections are records too.
+	const auto records = [&](std::size_t i_Count) { return objects(0, "") + Repeated(i_Count, "A:1\n"); };
+	const std::string many = std::to_string(Limits::c_Records) + " records";
+	EXPECT_FALSE(isBeyond(records(Limits::c_Records - 3), many));
+	EXPECT_TRUE(isBeyond(records(Limits::c_Records - 2), many));
+	// What came before the limit is there.
 	std::string nodes, connections;
-	for (std::size_t i = 1; i <= FbxFormat::Limits::c_Nodes + 1; ++i)
+	for (std::size_t i = 1; i <= Limits::c_Nodes + 1; ++i)
 	{
 		const std::string number = std::to_string(i);
 		nodes.append("Model: ").append(number).append(",\"Model::a\",\"Null\"\n");
 		connections.append("C: \"OO\",").append(number).append(",0\n");
 	}
 	const VResult result = Load(c_Head + "Objects: {\n" + nodes + "}\nConnections: {\n" + connections + "}\n");
-	EXPECT_FALSE(result.m_bComplete);
-	EXPECT_EQ(result.m_Nodes, int(FbxFormat::Limits::c_Nodes) + 1);
-	const auto objects = [&](std::size_t i_Count) {
-		return Load(c_Head + "Objects: {\n" + Repeated(i_Count, "Pose: 7,\"\"\n") + "}\nConnections: {\n}\n")
-		    .m_bComplete;
-	};
-	EXPECT_TRUE(objects(FbxFormat::Limits::c_Objects));
-	EXPECT_FALSE(objects(FbxFormat::Limits::c_Objects + 1));
-	const auto records = [&](std::size_t i_Count)
-	{ return Load(c_Head + "Objects: {\n}\nConnections: {\n}\n" + Repeated(i_Count, "A:1\n")).m_bComplete; };
-	// The root and the two sections are records too.
-	EXPECT_TRUE(records(FbxFormat::Limits::c_Records - 3));
-	EXPECT_FALSE(records(FbxFormat::Limits::c_Records - 2));
+	EXPECT_EQ(result.m_Nodes, int(Limits::c_Nodes) + 1);
 }
 
 } // namespace

@@ -144,7 +144,7 @@ TEST(Records, LieSixtyFourDeepAtMost)
 			std::string error;
 			Read(Write(rForm, {record}), &error);
 			EXPECT_EQ(
-			    error.substr(0, error.find(" (byte ")), depth > 65 ? "its records lie too deep in one another" : "")
+			    error.substr(0, error.find(" (byte ")), depth > 65 ? "its records lie more than 64 deep in one another" : "")
 			    << rForm.m_pName << ' ' << depth;
 		}
 }

@@ -15,15 +15,19 @@ inline constexpr std::size_t c_RecordDepth = 64;
 /// Positions in a file are kept in 32 bits, and the whole file stands in memory. Characters are below 0.5 GiB.
 inline constexpr std::uint64_t c_FileBytes = std::uint64_t(2) << 30;
 
-/// The lists that are made of a file, whatever is in it, stay below 128 MB together: 28 bytes for a record, 24 for a
-/// connection, 112 for an object, 0.9 KiB for a node, 0.8 KiB at most for a part of nodes. Large scenes with animation
-/// have some hundred thousand records; a character has some hundred nodes, and some thousand objects when it moves.
+/// The lists that are made of a file, whatever is in it, stay below 150 MB together: 28 bytes for a record, 24 for a
+/// connection, 112 for an object, 0.9 KiB for a node, 0.2 KiB for a cluster, 0.8 KiB at most for another part of nodes.
+/// Large scenes with animation have some hundred thousand records; a character has some hundred nodes, and some thousand
+/// objects when it moves.
 inline constexpr std::size_t c_Records = 1'000'000;
 inline constexpr std::size_t c_Objects = 250'000;
 inline constexpr std::size_t c_Nodes = 60'000;
 
-/// Materials, textures, meshes, skins and clusters; a character has some hundred, a crowd some thousand.
+/// Materials, textures, pictures, meshes and skins; a character has some hundred, a crowd some thousand.
 inline constexpr std::size_t c_Parts = 10'000;
+
+/// One for each mesh and bone that moves it; a set of a thousand modular meshes has some ten thousand.
+inline constexpr std::size_t c_Clusters = 100'000;
 
 /// All arrays that are decoded from one file, as bytes of their final storage.
 inline constexpr std::uint64_t c_DecodedBytes = 256'000'000;

@@ -52,7 +52,7 @@ bool FbxFormat::VTreeBuilder::Add(const VElement& i_rElement)
 {
 	if (m_rTree.m_Elements.size() >= Limits::c_Records)
 	{
-		Error("it has more records than are read", i_rElement.m_Name);
+		Error("it has more than " + std::to_string(Limits::c_Records) + " records", i_rElement.m_Name, true);
 		return false;
 	}
 	const VElementIndex added = VElementIndex(m_rTree.m_Elements.size());
@@ -70,15 +70,18 @@ bool FbxFormat::VTreeBuilder::Open(std::size_t i_End)
 {
 	if (m_Open.size() > Limits::c_RecordDepth)
 	{
-		Error("its records lie too deep in one another", Last().m_Name);
+		Error("its records lie more than " + std::to_string(Limits::c_RecordDepth) + " deep in one another",
+		    Last().m_Name, true);
 		return false;
 	}
 	m_Open.push_back({VElementIndex(m_rTree.m_Elements.size() - 1), c_NoElement, i_End});
 	return true;
 }
 
-void FbxFormat::VTreeBuilder::Error(std::string_view i_What, std::size_t i_Position)
+void FbxFormat::VTreeBuilder::Error(std::string_view i_What, std::size_t i_Position, bool i_bLimit)
 {
-	if (m_rTree.m_Error.empty())
-		m_rTree.m_Error = std::string(i_What) + " (byte " + std::to_string(i_Position) + ")";
+	if (!m_rTree.m_Error.empty())
+		return;
+	m_rTree.m_Error = std::string(i_What) + " (byte " + std::to_string(i_Position) + ")";
+	m_rTree.m_bBeyondLimit = i_bLimit;
 }

@@ -53,6 +53,9 @@ public:
 	/// The first thing that was broken, empty if nothing was.
 	const std::string& Error() const { return m_Error; }
 
+	/// Whether that was no damage, but more than is read.
+	bool IsBeyondLimit() const { return m_bBeyondLimit; }
+
 	std::size_t Size() const { return m_Elements.size(); }
 	const VElement& operator[](VElementIndex i_Element) const { return m_Elements[i_Element]; }
 	std::string_view Name(VElementIndex i_Element) const;
@@ -95,6 +98,7 @@ private:
 	std::string_view m_Bytes;
 	std::vector<VElement> m_Elements;
 	std::string m_Error;
+	bool m_bBeyondLimit = false;
 };
 
 } // namespace FbxFormat

@@ -23,8 +23,8 @@ public:
 
 	VElement& Last() { return m_rTree.m_Elements.back(); }
 
-	/// Notes what is broken, with its place. Only the first is kept.
-	void Error(std::string_view i_What, std::size_t i_Position);
+	/// Notes what is broken, or beyond a limit, with its place. Only the first is kept.
+	void Error(std::string_view i_What, std::size_t i_Position, bool i_bLimit = false);
 
 private:
 	struct VOpen

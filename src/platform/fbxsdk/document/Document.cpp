@@ -43,7 +43,9 @@ void FbxFormat::VDocument::ReadObjects()
 		{
 			if (m_Objects.size() == Limits::c_Objects)
 			{
-				m_Error = "it has more objects than are read";
+				m_bBeyondLimit = m_Error.empty();
+				if (m_bBeyondLimit)
+					m_Error = "it has more than " + std::to_string(Limits::c_Objects) + " objects";
 				break;
 			}
 			VValueCursor values(m_rTree, element);

@@ -65,6 +65,9 @@ public:
 	/// What of the document is missing, empty if nothing is.
 	const std::string& Error() const { return m_Error; }
 
+	/// Whether it has more objects than are read.
+	bool IsBeyondLimit() const { return m_bBeyondLimit; }
+
 	/// How many objects were left out because nothing could name them.
 	std::size_t Nameless() const { return m_Nameless; }
 
@@ -76,6 +79,7 @@ private:
 	const VElementTree& m_rTree;
 	bool m_bEscapes = false;
 	std::string m_Error;
+	bool m_bBeyondLimit = false;
 	std::size_t m_Nameless = 0;
 	std::vector<VObject> m_Objects;
 	std::vector<VConnection> m_Connections;

@@ -112,13 +112,17 @@ FbxFormat::VImportResult FbxFormat::VSceneBuilder::Build(
 		NVX_LOG("FBXIO", NVX::ELogWarning, "Objects left out because they have neither number nor name: %1%",
 		    rContent.m_pDocument->Nameless());
 	BuildSettings();
-	const bool bAll = BuildObjects(i_rKind.m_Version);
+	const std::string beyond = BuildObjects(i_rKind.m_Version);
 	Connect();
 	TellUnreached();
-	for (const std::string& rError : {rContent.m_Tree.Error(), rContent.m_pDocument->Error(),
-	         std::string(bAll ? "" : "it has more nodes, or parts of nodes, than are read")})
-		if (result.m_Error.empty())
+	for (const auto& [rError, bBeyondLimit] :
+	    {std::pair<const std::string&, bool>(rContent.m_Tree.Error(), rContent.m_Tree.IsBeyondLimit()),
+	        {rContent.m_pDocument->Error(), rContent.m_pDocument->IsBeyondLimit()}, {beyond, true}})
+		if (result.m_Error.empty() && !rError.empty())
+		{
 			result.m_Error = rError;
+			result.m_bBeyondLimit = bBeyondLimit;
+		}
 	if (!io_rProgress.Tell(100.0f, "Building the scene"))
 		BuildEmpty();
 	return result;
@@ -195,7 +199,7 @@ FbxFormat::VSceneBuilder::VBuilt FbxFormat::VSceneBuilder::BuildPart(
 	return {};
 }
 
-bool FbxFormat::VSceneBuilder::BuildObjects(std::uint32_t i_Version)
+std::string FbxFormat::VSceneBuilder::BuildObjects(std::uint32_t i_Version)
 {
 	fbxsdk::FbxScene::VContent& rContent = *m_rScene.m_pContent;
 	const VDocument& rDocument = *rContent.m_pDocument;
@@ -204,20 +208,26 @@ bool FbxFormat::VSceneBuilder::BuildObjects(std::uint32_t i_Version)
 	const VMaterialReader materials(rDocument);
 
 	m_Built.resize(rDocument.Objects().size());
-	std::size_t parts = 0;
+	std::size_t parts = 0, clusters = 0;
+	const auto moreThan = [](std::size_t i_Limit, const char* i_pWhat)
+	{ return "it has more than " + std::to_string(i_Limit) + ' ' + i_pWhat; };
 	for (VObjectIndex object = 0; object < rDocument.Objects().size(); ++object)
 	{
 		const VObject& rObject = rDocument.Objects()[object];
 		if (rObject.m_Kind != "Model")
 		{
-			if (rObject.m_Kind != "NodeAttribute" && parts > Limits::c_Parts)
-				return false;
 			m_Built[object] = BuildPart(rObject, materials);
-			parts += rObject.m_Kind != "NodeAttribute" && m_Built[object].index() != 0 ? 1 : 0;
+			const bool bCluster = std::holds_alternative<fbxsdk::FbxCluster*>(m_Built[object]);
+			clusters += bCluster ? 1 : 0;
+			parts += !bCluster && rObject.m_Kind != "NodeAttribute" && m_Built[object].index() != 0 ? 1 : 0;
+			if (parts > Limits::c_Parts)
+				return moreThan(Limits::c_Parts, "materials, textures, pictures, meshes and skins");
+			if (clusters > Limits::c_Clusters)
+				return moreThan(Limits::c_Clusters, "clusters of skins");
 			continue;
 		}
 		if (rContent.m_Nodes.size() > Limits::c_Nodes)
-			return false;
+			return moreThan(Limits::c_Nodes, "nodes");
 		auto* const pNode = new fbxsdk::FbxNode(rDocument.Decoded(rObject.m_Name));
 		rContent.m_Nodes.emplace_back(pNode);
 		m_Built[object] = pNode;
@@ -232,7 +242,7 @@ bool FbxFormat::VSceneBuilder::BuildObjects(std::uint32_t i_Version)
 		if (rObject.m_SubKind == "Mesh" && record.Child("Vertices").m_Element != c_NoElement)
 			pNode->m_pData->m_pMesh = AddPart(new fbxsdk::FbxMesh(pNode->GetName(), record));
 	}
-	return true;
+	return {};
 }
 
 void FbxFormat::VSceneBuilder::Connect()

@@ -29,6 +29,8 @@ struct VImportResult
 {
 	/// The first thing that was broken, empty if nothing was.
 	std::string m_Error;
+	/// That was no damage, but more than is read.
+	bool m_bBeyondLimit = false;
 	bool m_bEncrypted = false;
 };
 
@@ -48,8 +50,8 @@ public:
 
 private:
 	void BuildSettings();
-	/// False if there are more than c_Nodes or c_Parts.
-	bool BuildObjects(std::uint32_t i_Version);
+	/// Empty, or what there is more of than is read.
+	std::string BuildObjects(std::uint32_t i_Version);
 	void Connect();
 	void ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::FbxNode& io_rParent);
 	void TellUnreached();

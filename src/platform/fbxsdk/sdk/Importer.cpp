@@ -131,7 +131,8 @@ bool fbxsdk::FbxImporter::Import(FbxDocument* pDocument, bool pNonBlocking)
 	if (result.m_bEncrypted)
 		return Fail(FbxStatus::ePasswordError, "File asks for a password");
 	if (!result.m_Error.empty())
-		return Fail(FbxStatus::eInvalidFile, "File is corrupted: " + result.m_Error);
+		return Fail(FbxStatus::eInvalidFile,
+		    (result.m_bBeyondLimit ? "File holds more than is read: " : "File is corrupted: ") + result.m_Error);
 	m_Status = {};
 	return true;
 }
