@@ -4,6 +4,7 @@
 #include "retarget/HelpFormatter.h"
 #include "retarget/Output.h"
 #include "retarget/Parsing.h"
+#include "retarget/Signals.h"
 
 #include "DebugServices/GlobalLog.h"
 
@@ -101,6 +102,7 @@ VProgram MakeProgram(const VRender& i_rRender)
 
 int Run(std::vector<std::string> i_Arguments, const VRender& i_rRender)
 {
+	LeaveNothingOnSignals();
 	VProgram program = MakeProgram(i_rRender);
 	std::shared_ptr<void> pMessages = ShowMessages({});
 	try

@@ -2,6 +2,8 @@
 
 #include "retarget/Commands.h"
 
+#include <boost/filesystem/operations.hpp>
+
 #include <charconv>
 
 namespace CommandLine
@@ -30,6 +32,9 @@ bool ParseSize(const std::string& i_rText, VRenderSettings& o_rSettings)
 EExitStatus Render(const VRenderSettings& i_rSettings, const VRender& i_rRender)
 {
 	CheckOutput(i_rSettings.m_Out, c_PictureFile, {i_rSettings.m_In, i_rSettings.m_Source});
+	boost::system::error_code error;
+	if (!i_rSettings.m_Skins.empty() && !boost::filesystem::is_directory(i_rSettings.m_Skins, error))
+		throw VCommandError(EBadInput, "There is no folder \"" + i_rSettings.m_Skins + "\" to look for skins in");
 	return i_rRender(i_rSettings);
 }
 

@@ -5,6 +5,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <csignal>
 #include <sched.h>
 #include <sys/mount.h>
@@ -177,6 +178,79 @@ TEST(SaveFile, KeepsTheOldFileWhenTheDiskIsFull)
 	EXPECT_EQ(WEXITSTATUS(status), 0);
 }
 
+/// A process that saves to a file without end; TERM ends it as a program that keeps its folders clean ends.
+/// @return its id, in the middle of a save as far as that can be seen.
+pid_t StartSaving(const path& i_rFile, const std::string& i_rA, const std::string& i_rB)
+{
+	int ready[2];
+	EXPECT_EQ(::pipe(ready), 0);
+	const pid_t child = ::fork();
+	if (child == 0)
+	{
+		::signal(SIGTERM,
+		    [](int)
+		    {
+			    UtilsFileSystem::RemoveUnfinishedSaves();
+			    ::_exit(0);
+		    });
+		std::string error;
+		for (int round = 0;; ++round)
+			if (SaveFile(i_rFile, round % 2 == 0 ? i_rA : i_rB, error) != 0
+			    || (round < 4 && ::write(ready[1], "x", 1) != 1))
+				::_exit(1);
+	}
+	char byte = 0;
+	for (int round = 0; round < 4; ++round)
+		EXPECT_EQ(::read(ready[0], &byte, 1), 1);
+	::close(ready[0]);
+	::close(ready[1]);
+	const auto isTemporary = [](const auto& i_rEntry) { return i_rEntry.path().extension() == ".tmp"; };
+	const boost::filesystem::directory_iterator end;
+	while (std::find_if(boost::filesystem::directory_iterator(i_rFile.parent_path()), end, isTemporary) == end)
+		;
+	return child;
+}
+
+void End(pid_t i_Child, int i_Signal)
+{
+	::kill(i_Child, i_Signal);
+	int status = 0;
+	EXPECT_EQ(::waitpid(i_Child, &status, 0), i_Child);
+	EXPECT_TRUE(i_Signal == SIGKILL ? WIFSIGNALED(status) : WIFEXITED(status) && WEXITSTATUS(status) == 0) << status;
+}
+
+TEST(SaveFile, ASignalLeavesNothingBehind)
+{
+	const VTestFolder folder;
+	// Files of their own, so that none clears what another left, and large ones, so that the signal falls into a save.
+	const std::string bytes(8000000, 'a');
+	for (int round = 0; round < 10; ++round)
+		End(StartSaving(folder / std::to_string(round), bytes, bytes), SIGTERM);
+	EXPECT_EQ(folder.Count(), 10);
+}
+
+TEST(SaveFile, TheNextSaveClearsWhatAKilledOneLeft)
+{
+	const VTestFolder folder;
+	const path file = folder / "a.qrr";
+	const std::string bytes(8000000, 'a');
+	for (int round = 0; folder.Count() < 2; ++round)
+	{
+		ASSERT_LT(round, 100) << "never killed within a save";
+		End(StartSaving(file, bytes, bytes), SIGKILL);
+	}
+	ExpectSaved(folder / "b.qrr", "another file clears its own alone");
+	EXPECT_EQ(folder.Count(), 3);
+	ExpectSaved(file, "one");
+	EXPECT_EQ(folder.Count(), 2);
+	const pid_t child = StartSaving(file, bytes, bytes);
+	std::string error;
+	for (int round = 0; round < 20; ++round)
+		EXPECT_EQ(SaveFile(file, bytes, error), NVX::Status::c_Success);
+	EXPECT_EQ(::waitpid(child, nullptr, WNOHANG), 0) << "it failed: what was on its way is gone";
+	End(child, SIGTERM);
+}
+
 /// A process that saves without end is read from all the time, and killed in the middle.
 TEST(SaveFile, IsWholeAtEveryMoment)
 {
@@ -184,33 +258,15 @@ TEST(SaveFile, IsWholeAtEveryMoment)
 	const path file = folder / "a.qrr";
 	const std::string contents[] = {std::string(300000, 'a'), std::string(200000, 'b')};
 	Put(file, contents[0]);
-	int ready[2];
-	ASSERT_EQ(::pipe(ready), 0);
-	const pid_t child = ::fork();
-	ASSERT_GE(child, 0);
-	if (child == 0)
-	{
-		std::string error;
-		for (int round = 0;; ++round)
-			if (SaveFile(file, contents[round % 2], error) != 0 || (round < 4 && ::write(ready[1], "x", 1) != 1))
-				::_exit(1);
-	}
-	char byte = 0;
-	for (int round = 0; round < 4; ++round)
-		ASSERT_EQ(::read(ready[0], &byte, 1), 1);
+	const pid_t child = StartSaving(file, contents[0], contents[1]);
 	for (int round = 0; round < 100; ++round)
 	{
 		const std::string bytes = Get(file);
 		ASSERT_TRUE(bytes == contents[0] || bytes == contents[1]) << bytes.size();
 	}
-	::kill(child, SIGKILL);
-	int status = 0;
-	ASSERT_EQ(::waitpid(child, &status, 0), child);
-	EXPECT_TRUE(WIFSIGNALED(status));
+	End(child, SIGKILL);
 	const std::string bytes = Get(file);
 	EXPECT_TRUE(bytes == contents[0] || bytes == contents[1]) << bytes.size();
-	::close(ready[0]);
-	::close(ready[1]);
 }
 
 } // namespace

@@ -62,6 +62,8 @@ TEST_F(Input, OfFbxFiles)
 {
 	RunRows(
 	    {
+	        {"folder of skins", {"render", "x.qrr", "--skins", "nothing", "-o", "x.png"}, 3, "",
+	            "error retarget: There is no folder \"nothing\" to look for skins in\n"},
 	        {"missing", {"fbx", "nothing.fbx"}, 3, "", "error FBXIO: File nothing.fbx not found"},
 	        {"folder", {"fbx", "."}, 3, "", "error FBXIO: File . not found"},
 	        {"empty", {"fbx", "empty"}, 3, "", "error FBXIO: Call to KFbxImporter::Initialize() failed."},

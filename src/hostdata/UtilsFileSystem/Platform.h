@@ -18,6 +18,12 @@ namespace UtilsFileSystem::Platform
 
 std::shared_ptr<IProcessTable> GetProcessTable();
 
+/// Of this process; no other process of this machine has it as long as this one runs.
+std::uint32_t ProcessId();
+/// False where that cannot be told.
+bool IsProcessGone(std::uint32_t i_ProcessId);
+std::string MachineName();
+
 /// The registry's root of the local machine; null on a system without a registry.
 std::unique_ptr<IRegistryKey> OpenLocalMachine();
 
@@ -59,6 +65,8 @@ bool IsReadOnly(const boost::filesystem::path& i_rFile);
 int Replace(const boost::filesystem::path& i_rFrom, const boost::filesystem::path& i_rTo);
 /// Waits until the names in a folder are on the disk, where the file system offers that.
 int SyncFolder(const boost::filesystem::path& i_rFolder);
+/// Removes a file, given as NativePath gives it; may be called from a signal handler.
+void Unlink(const boost::filesystem::path::value_type* i_pNative) noexcept;
 std::string ErrorText(int i_Error);
 /// @}
 

@@ -226,6 +226,23 @@ std::shared_ptr<IProcessTable> GetProcessTable()
 	return std::make_shared<VProcessTable>();
 }
 
+std::uint32_t ProcessId()
+{
+	return std::uint32_t(::getpid());
+}
+
+bool IsProcessGone(std::uint32_t i_ProcessId)
+{
+	// 0 and negative numbers would mean groups of processes.
+	return pid_t(i_ProcessId) > 0 && ::kill(pid_t(i_ProcessId), 0) != 0 && errno == ESRCH;
+}
+
+std::string MachineName()
+{
+	char name[256] = {};
+	return ::gethostname(name, sizeof(name) - 1) == 0 ? name : "";
+}
+
 boost::filesystem::path::string_type NativePath(const boost::filesystem::path& i_rPath)
 {
 	return i_rPath.native();
@@ -324,6 +341,11 @@ int SyncFolder(const boost::filesystem::path& i_rFolder)
 	if (!folder)
 		return errno == EACCES ? 0 : errno;
 	return ::fsync(folder.Get()) == 0 || errno == EINVAL || errno == ENOTSUP ? 0 : errno;
+}
+
+void Unlink(const char* i_pNative) noexcept
+{
+	::unlink(i_pNative);
 }
 
 std::string ErrorText(int i_Error)

@@ -174,6 +174,26 @@ std::shared_ptr<IProcessTable> GetProcessTable()
 	return std::make_shared<VProcessTable>();
 }
 
+std::uint32_t ProcessId()
+{
+	return ::GetCurrentProcessId();
+}
+
+bool IsProcessGone(std::uint32_t i_ProcessId)
+{
+	const VHandle process(::OpenProcess(SYNCHRONIZE, FALSE, i_ProcessId));
+	if (!process)
+		return ::GetLastError() == ERROR_INVALID_PARAMETER;
+	return ::WaitForSingleObject(process.Get(), 0) == WAIT_OBJECT_0;
+}
+
+std::string MachineName()
+{
+	char name[MAX_COMPUTERNAME_LENGTH + 1] = {};
+	DWORD size = sizeof(name);
+	return ::GetComputerNameA(name, &size) ? name : "";
+}
+
 std::wstring NativePath(const boost::filesystem::path& i_rPath)
 {
 	boost::system::error_code error;
@@ -283,6 +303,11 @@ int SyncFolder(const boost::filesystem::path&)
 {
 	// The move itself waits for the disk.
 	return 0;
+}
+
+void Unlink(const wchar_t* i_pNative) noexcept
+{
+	::DeleteFileW(i_pNative);
 }
 
 std::string ErrorText(int i_Error)

@@ -17,4 +17,9 @@ namespace UtilsFileSystem
 /// could be written; in these cases o_rError tells why, with the path.
 std::uint32_t SaveFile(const boost::filesystem::path& i_rPath, std::string_view i_Bytes, std::string& o_rError);
 
+/// Removes what saves of this process that are on their way have written so far, in this copy of the library. For the
+/// handler of a signal that ends the process, which must then end: what the saves stood for stays as it was. A process
+/// that ends otherwise leaves that file, and the next save of the same path on this machine removes it.
+void RemoveUnfinishedSaves() noexcept;
+
 } // namespace UtilsFileSystem
