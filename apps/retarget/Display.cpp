@@ -2,6 +2,7 @@
 
 #include "retarget/Messages.h"
 
+#include <QByteArray>
 #include <QString>
 #include <QtGlobal>
 
@@ -25,12 +26,14 @@ int LevelOf(QtMsgType i_Type)
 	}
 }
 
-void HandleQtMessage(QtMsgType i_Type, const QMessageLogContext&, const QString& i_rText)
+void HandleQtMessage(QtMsgType i_Type, const QMessageLogContext& i_rContext, const QString& i_rText)
 {
 	if (i_Type != QtFatalMsg)
 	{
-		// Sessions without one, such as a job of cron, are no worse for it.
-		const bool bNoMatter = i_rText.startsWith(QLatin1String("QStandardPaths: XDG_RUNTIME_DIR not set"));
+		// What Qt says to itself is nothing that an operator could mend. Sessions without that folder, such as a job of
+		// cron, are no worse for it.
+		const bool bNoMatter = QByteArray(i_rContext.category).startsWith("qt.")
+		    || i_rText.startsWith(QLatin1String("QStandardPaths: XDG_RUNTIME_DIR not set"));
 		NVX_LOG("Qt", bNoMatter ? NVX::ELogDetail : LevelOf(i_Type), "%1%", i_rText.toStdString());
 		return;
 	}

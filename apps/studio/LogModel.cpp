@@ -5,11 +5,28 @@
 
 #include <QColor>
 
+#include <algorithm>
+#include <cstddef>
 #include <mutex>
-#include <vector>
 
 namespace StudioHost
 {
+namespace
+{
+
+/// Among so many of the newest messages one is looked for that says the same.
+constexpr std::ptrdiff_t c_Remembered = 100;
+
+/// The end if there is none.
+template <typename TEntries, typename TEntry>
+auto FindLatest(TEntries& i_rEntries, const TEntry& i_rEntry)
+{
+	const auto first = i_rEntries.end() - std::min(c_Remembered, std::ptrdiff_t(i_rEntries.size()));
+	return std::find_if(
+	    first, i_rEntries.end(), [&i_rEntry](const TEntry& i_rOther) { return i_rOther.IsSame(i_rEntry); });
+}
+
+} // namespace
 
 /// What was logged and has no row yet. The sink may still run on another thread while the model ends.
 struct VLogModel::VInbox
@@ -55,14 +72,15 @@ VLogModel::~VLogModel()
 
 void VLogModel::TakeInbox()
 {
-	std::deque<VEntry> entries;
+	std::deque<VEntry> inbox;
 	{
 		const std::lock_guard lock(m_pInbox->m_Mutex);
-		entries.swap(m_pInbox->m_Entries);
+		inbox.swap(m_pInbox->m_Entries);
 		m_pInbox->m_bPosted = false;
 	}
-	if (entries.empty())
+	if (inbox.empty())
 		return;
+	std::vector<VEntry> entries = Counted(std::move(inbox));
 	// A few at a time go from the front, so that a full list does not move for every message.
 	const int size = int(m_Entries.size() + entries.size());
 	if (size > m_MaximumRows)
@@ -89,6 +107,33 @@ void VLogModel::TakeInbox()
 	endInsertRows();
 	if (bNewCategory)
 		emit categoriesChanged();
+}
+
+std::vector<VLogModel::VEntry> VLogModel::Counted(std::deque<VEntry> i_Entries)
+{
+	std::vector<VEntry> counted;
+	counted.reserve(i_Entries.size());
+	for (VEntry& rEntry : i_Entries)
+	{
+		if (const auto found = FindLatest(counted, rEntry); found != counted.end())
+		{
+			rEntry.m_Count += found->m_Count;
+			counted.erase(found);
+		}
+		counted.push_back(std::move(rEntry));
+	}
+	for (VEntry& rEntry : counted)
+	{
+		const auto found = FindLatest(m_Entries, rEntry);
+		if (found == m_Entries.end())
+			continue;
+		rEntry.m_Count += found->m_Count;
+		const int row = int(found - m_Entries.begin());
+		beginRemoveRows({}, row, row);
+		m_Entries.erase(found);
+		endRemoveRows();
+	}
+	return counted;
 }
 
 void VLogModel::Clear()
@@ -121,7 +166,11 @@ QVariant VLogModel::data(const QModelIndex& i_rIndex, int i_Role) const
 		{
 		case ELevel: return QString::fromLatin1(CommandLine::LevelName(rEntry.m_Level));
 		case ECategory: return rEntry.m_Category;
-		default: return QString::fromStdString(CommandLine::OneLine(rEntry.m_Text.toStdString()));
+		default:
+		{
+			const QString text = QString::fromStdString(CommandLine::OneLine(rEntry.m_Text.toStdString()));
+			return rEntry.m_Count == 1 ? text : tr("%1 (%2 times)").arg(text).arg(rEntry.m_Count);
+		}
 		}
 	case Qt::ToolTipRole: return i_rIndex.column() == EText ? rEntry.m_Text.toHtmlEscaped() : QVariant();
 	case Qt::ForegroundRole:

@@ -8,12 +8,14 @@
 
 #include <deque>
 #include <memory>
+#include <vector>
 
 namespace StudioHost
 {
 
-/// The messages of the log as rows, the newest last. Messages come from any thread; rows appear on the thread of the
-/// dispatcher, in the order in which they were logged.
+/// The messages of the log as rows, the newest last; one that came a short while before is counted and not repeated.
+/// Messages come from any thread; rows appear on the thread of the dispatcher, in the order in which they were logged
+/// last.
 class VLogModel : public QAbstractTableModel
 {
 	Q_OBJECT
@@ -57,10 +59,18 @@ private:
 		int m_Level;
 		QString m_Category;
 		QString m_Text;
+		int m_Count = 1;
+
+		bool IsSame(const VEntry& i_rOther) const
+		{
+			return m_Level == i_rOther.m_Level && m_Text == i_rOther.m_Text && m_Category == i_rOther.m_Category;
+		}
 	};
 	struct VInbox;
 
 	void TakeInbox();
+	/// Those that came before are taken out of their places and counted.
+	std::vector<VEntry> Counted(std::deque<VEntry> i_Entries);
 
 	const int m_MaximumRows;
 	std::deque<VEntry> m_Entries;

@@ -66,6 +66,9 @@ VLogPanel::VLogPanel(VLogModel& i_rModel, QWidget* i_pParent)
 	m_pTable->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
 	m_pTable->horizontalHeader()->resizeSection(VLogModel::ELevel, 90);
 	m_pTable->horizontalHeader()->resizeSection(VLogModel::ECategory, 150);
+	connect(m_pTable, &QTableView::clicked, this,
+	    [this](const QModelIndex& i_rIndex)
+	    { emit messageClicked(i_rIndex.data(VLogModel::EWholeTextRole).toString()); });
 	auto* const pCopyAction = new QAction(tr("Copy"), m_pTable);
 	pCopyAction->setShortcut(QKeySequence::Copy);
 	pCopyAction->setShortcutContext(Qt::WidgetShortcut);

@@ -26,6 +26,10 @@ public:
 	/// Puts TextToCopy on the clipboard.
 	void Copy() const;
 
+signals:
+	/// The operator looks at this message, as a whole.
+	void messageClicked(const QString& i_rText);
+
 private:
 	void UpdateCategories();
 

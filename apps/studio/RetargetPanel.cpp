@@ -8,11 +8,13 @@
 #include "TesselPluginInterface/IParameterRegistry.h"
 #include "studio/FileKind.h"
 
+#include <QAbstractItemModel>
 #include <QFileInfo>
 #include <QQmlComponent>
 #include <QQuickItem>
 #include <QQuickWidget>
 #include <QQuickWindow>
+#include <QRegularExpression>
 
 #include <algorithm>
 #include <utility>
@@ -184,6 +186,41 @@ bool VRetargetPanel::HasUnsavedChanges() const
 	bool bUnsaved = false;
 	QMetaObject::invokeMethod(m_pDocument, "HasUnsavedChanges", Qt::DirectConnection, Q_RETURN_ARG(bool, bUnsaved));
 	return bUnsaved;
+}
+
+std::vector<NVX::ISelectionItem> VRetargetPanel::ItemsNamedIn(const QString& i_rMessage) const
+{
+	// Names stand in quotes, targets by their number.
+	static const QRegularExpression s_Name(QStringLiteral("'([^']+)'|\"([^\"]+)\""));
+	static const QRegularExpression s_Target(QStringLiteral("\\b[Tt]arget #?(\\d+)"));
+	QStringList names;
+	for (auto match = s_Name.globalMatch(i_rMessage); match.hasNext();)
+		names << match.next().capturedTexts().last();
+	const QRegularExpressionMatch target = s_Target.match(i_rMessage);
+
+	std::vector<NVX::ISelectionItem> items;
+	const auto take = [&](const char* i_pModel, const auto& i_IsNamed)
+	{
+		const auto* const pPanel = qobject_cast<NVX::IQuickWidget*>(m_pWidget.data());
+		const auto* const pModel = pPanel
+		    ? qobject_cast<QAbstractItemModel*>(pPanel->contextProperty(QLatin1String(i_pModel)).value<QObject*>())
+		    : nullptr;
+		if (!pModel)
+			return;
+		const QHash<int, QByteArray> roles = pModel->roleNames();
+		for (int row = 0; row < pModel->rowCount(); ++row)
+		{
+			const QModelIndex index = pModel->index(row, 0);
+			if (i_IsNamed(row, index.data(roles.key("name")).toString()))
+				items.push_back(index.data(roles.key("selectionItem")).value<NVX::ISelectionItem>());
+		}
+	};
+	const auto isSegment = [&](int, const QString& i_rName) { return names.contains(i_rName); };
+	take("SourceSegmentModel", isSegment);
+	take("TargetSegmentModel", isSegment);
+	if (target.hasMatch())
+		take("TargetModel", [&](int i_Row, const QString&) { return i_Row == target.captured(1).toInt(); });
+	return items;
 }
 
 void VRetargetPanel::TellIgnored(const QString& i_rCommand, const QString& i_rReason)

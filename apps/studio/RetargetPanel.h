@@ -1,5 +1,7 @@
 #pragma once
 
+#include "NVX/ISelectionItem.h"
+
 #include <QObject>
 #include <QPointer>
 #include <QRectF>
@@ -8,6 +10,7 @@
 #include <QVariant>
 
 #include <memory>
+#include <vector>
 
 class QWidget;
 
@@ -44,6 +47,9 @@ public:
 
 	/// The target subject would be lost.
 	bool HasUnsavedChanges() const;
+
+	/// The segments and the target that a message names, for the selection.
+	std::vector<NVX::ISelectionItem> ItemsNamedIn(const QString& i_rMessage) const;
 
 	QWidget* Widget() const { return m_pWidget; }
 

@@ -67,7 +67,9 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 
 	m_pLogDock = Named(new QDockWidget(tr("Log"), this), "LogDock", tr("Log"));
 	m_pLogDock->setAcceptDrops(true);
-	m_pLogDock->setWidget(new VLogPanel(*m_pLog));
+	auto* const pLogPanel = new VLogPanel(*m_pLog);
+	connect(pLogPanel, &VLogPanel::messageClicked, this, &VStudioWindow::SelectNamedIn);
+	m_pLogDock->setWidget(pLogPanel);
 	m_pLogDock->setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Maximum);
 	addDockWidget(Qt::BottomDockWidgetArea, m_pLogDock);
 
@@ -187,6 +189,14 @@ bool VStudioWindow::MayClose()
 		return !m_pRetargetPanel->HasUnsavedChanges();
 	default: return false;
 	}
+}
+
+void VStudioWindow::SelectNamedIn(const QString& i_rMessage)
+{
+	const auto items =
+	    m_pRetargetPanel ? m_pRetargetPanel->ItemsNamedIn(i_rMessage) : std::vector<NVX::ISelectionItem>();
+	if (!items.empty())
+		m_pContext->GetSelectionManager()->Selection().Replace(items);
 }
 
 void VStudioWindow::Say(const QString& i_rText)

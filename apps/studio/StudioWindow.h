@@ -67,6 +67,8 @@ private:
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
 	void ShowAbout();
+	/// Selects the segments and the target that a message is about; nothing changes if it names none.
+	void SelectNamedIn(const QString& i_rMessage);
 	void Say(const QString& i_rText);
 	/// Asks what is to become of changes that are not saved.
 	/// @return false if the window must stay.

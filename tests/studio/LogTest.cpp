@@ -1,5 +1,6 @@
 #include "Host.h"
 
+#include "retarget/Display.h"
 #include "studio/LogModel.h"
 #include "studio/LogPanel.h"
 #include "studio/QtDispatcher.h"
@@ -53,6 +54,41 @@ TEST_F(Log, ShowsMessagesOfAnyThreadInTheirOrder)
 	EXPECT_EQ(model.Categories(), (QStringList{"FBXIO", "System"}));
 	model.Clear();
 	EXPECT_EQ(model.rowCount(), 0);
+}
+
+TEST_F(Log, CountsWhatIsRepeated)
+{
+	VLogModel model(m_pDispatcher);
+	const QAbstractItemModelTester tester(&model, QAbstractItemModelTester::FailureReportingMode::Fatal);
+	const auto log = [](int i_Level, const char* i_pText) { NVX_LOG("FBXIO", i_Level, "%1%", i_pText); };
+	for (int i = 0; i < 3; ++i)
+	{
+		log(NVX::ELogError, "not found");
+		log(NVX::ELogWarning, "not found");
+		log(NVX::ELogError, "not opened");
+		// Some have a row already, some wait with their like.
+		if (i > 0)
+			RunEvents();
+	}
+	log(NVX::ELogError, "not found");
+	RunEvents();
+	ASSERT_EQ(model.rowCount(), 3);
+	EXPECT_EQ(Row(model, 0), "warning|FBXIO|not found (3 times)");
+	EXPECT_EQ(Row(model, 1), "error|FBXIO|not opened (3 times)");
+	EXPECT_EQ(Row(model, 2), "error|FBXIO|not found (4 times)");
+}
+
+TEST_F(Log, LeavesOutWhatQtSaysToItself)
+{
+	VLogModel model(m_pDispatcher);
+	CommandLine::PrepareDisplay({"test", CommandLine::EBadInput, ""});
+	QMessageLogger("", 0, "", "qt.qpa.xcb").warning("XCB error: 8");
+	QMessageLogger("", 0, "", "qml").warning("of a panel");
+	qInstallMessageHandler(nullptr);
+	RunEvents();
+	ASSERT_EQ(model.rowCount(), 2);
+	EXPECT_EQ(Row(model, 0), "detail|Qt|XCB error: 8");
+	EXPECT_EQ(Row(model, 1), "warning|Qt|of a panel");
 }
 
 TEST_F(Log, KeepsTheNewestRows)

@@ -28,6 +28,7 @@
 #include <QQuickItem>
 #include <QQuickWidget>
 #include <QQuickWindow>
+#include <QTableView>
 #include <QTest>
 #include <QTimer>
 
@@ -195,6 +196,35 @@ TEST_F(Window, ExplainsSilentCommands)
 	const QAbstractItemModel& rLog = m_pWindow->Log();
 	const int last = rLog.rowCount() - 1;
 	EXPECT_EQ(rLog.index(last, StudioHost::VLogModel::ECategory).data().toString(), "Command");
+}
+
+TEST_F(Window, SelectsWhatAMessageIsAbout)
+{
+	LoadPanel();
+	const QString target = Path("performer.qrr");
+	ASSERT_TRUE(QFile::copy(c_Source, target));
+	m_pWindow->Open(c_Source);
+	m_pWindow->Open(target);
+	RunEvents();
+	auto& rTable = *m_pWindow->findChild<QTableView*>("LogTable");
+	const TesselPluginInterface::ISelection& rSelection = m_pWindow->Context().GetSelectionManager()->Selection();
+	const auto selected = [&rSelection](NVX::ESelectionKind i_Kind) { return rSelection.ItemsOfKind(i_Kind).size(); };
+	const struct
+	{
+		const char* m_pMessage;
+		std::size_t m_Segments, m_Targets;
+	} rows[] = {{"Segment 'L_Hand' does not follow", 1, 0}, {"The Pelvis is no name in quotes", 1, 0},
+	    {"State X of target 3 stays as it was", 0, 1}, {"\"L_Hand\" and 'Pelvis', target #2", 2, 1}};
+	for (const auto& rRow : rows)
+	{
+		NVX_LOG("Test", NVX::ELogError, "%1%", rRow.m_pMessage);
+		RunEvents();
+		const QModelIndex last = rTable.model()->index(rTable.model()->rowCount() - 1, 2);
+		QTest::mouseClick(rTable.viewport(), Qt::LeftButton, {}, rTable.visualRect(last).topLeft() + QPoint(5, 5));
+		EXPECT_EQ(selected(NVX::ESelectionSourceSegment), rRow.m_Segments) << rRow.m_pMessage;
+		EXPECT_EQ(selected(NVX::ESelectionTargetSegment), rRow.m_Segments) << rRow.m_pMessage;
+		EXPECT_EQ(selected(NVX::ESelectionTarget), rRow.m_Targets) << rRow.m_pMessage;
+	}
 }
 
 TEST_F(Window, SaysWhyThereIsNoPanel)
