@@ -50,10 +50,10 @@ class Reader : public testing::TestWithParam<VTestForm>
 INSTANTIATE_TEST_SUITE_P(
     Forms, Reader, testing::ValuesIn(c_Forms), [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
 
-/// Forms that few exporters write: values on the line after a name, a value of one byte.
+/// Forms that few exporters write: values on the line after a name, a value of one byte, models at the top.
 TEST(Reader, OddFormsAreRead)
 {
-	for (const char* pFile : {"ufbx_blender_279_default_a6100", "ufbx_maya_audio_b7500"})
+	for (const char* pFile : {"ufbx_blender_279_default_a6100", "ufbx_maya_audio_b7500", "ufbx_max_cube_b5000"})
 	{
 		SCOPED_TRACE(pFile);
 		VLoaded file(Get(RETARGET_TEST_DATA "/fbx/"s + pFile + ".fbx"));
@@ -121,15 +121,15 @@ TEST(Reader, WhatIsNotFbxIsRefused)
 
 TEST(Reader, OtherVersionsAreRefusedWithTheirNumbers)
 {
-	const std::pair<VTestForm, const char*> rows[]{{{"", EForm::Binary, 5800}, "5.8.0"},
-	    {{"", EForm::Text, 5000}, "5.0.0"}, {{"", EForm::Binary, 8010}, "8.0.1"}, {{"", EForm::Text, 8000}, "8.0.0"}};
+	const std::pair<VTestForm, const char*> rows[]{{{"", EForm::Binary, 3000}, "3.0.0"},
+	    {{"", EForm::Text, 4900}, "4.9.0"}, {{"", EForm::Binary, 8010}, "8.0.1"}, {{"", EForm::Text, 8000}, "8.0.0"}};
 	for (const auto& [form, version] : rows)
 	{
 		const VLoaded loaded(Write(form, Bones({})));
 		EXPECT_FALSE(loaded.m_bLoaded);
 		EXPECT_EQ(loaded.m_Messages,
 		    (VMessages{"2 Call to KFbxImporter::Initialize() failed.",
-		        "2 Error returned: File version is not one of 6.0 to 7.9",
+		        "2 Error returned: File version is not one of 5.0 to 7.9",
 		        "2 FBX file import error: File version is old or too new.\n",
 		        "2 FBX version number for file PATH is "s + version + "\n\n", "2 Current FBX version is 2020.0.1\n"}));
 	}

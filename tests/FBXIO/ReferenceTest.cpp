@@ -3,6 +3,7 @@
 #include "FBXIO/FBXReader.h"
 
 #include "Imported.h"
+#include "SmallFiles.h"
 
 #include <nlohmann/json.hpp>
 
@@ -196,19 +197,10 @@ TEST_P(ReferenceFile, SkinsAgree)
 INSTANTIATE_TEST_SUITE_P(Files, ReferenceFile, testing::ValuesIn(Files()),
     [](const auto& i_rInfo) { return i_rInfo.param.substr(i_rInfo.param.find('/') + 1); });
 
-/// What one exporter wrote of one character in binary and as text, which has fewer digits: closer to each other than to
-/// what other programs find.
-TEST(ReferenceTwins, ReadToTheSameValues)
+void ExpectEqual(const VSkin (&i_rSkins)[2])
 {
-	VSkin skins[2];
-	for (const int i : {0, 1})
-	{
-		FBXReader reader;
-		ASSERT_TRUE(reader.LoadFile(c_Folder + (i == 0 ? "own_ns_yup_cm_a7400.fbx" : "own_ns_yup_cm_b7400.fbx")));
-		reader.ReadSkin(skins[i]);
-	}
-	ASSERT_EQ(skins[0].m_Meshes.size(), skins[1].m_Meshes.size());
-	ASSERT_EQ(skins[0].m_pSkeleton->size(), skins[1].m_pSkeleton->size());
+	ASSERT_EQ(i_rSkins[0].m_Meshes.size(), i_rSkins[1].m_Meshes.size());
+	ASSERT_EQ(i_rSkins[0].m_pSkeleton->size(), i_rSkins[1].m_pSkeleton->size());
 	const auto near = [](const QMatrix4x4& i_rA, const QMatrix4x4& i_rB)
 	{
 		float most = 0.0f;
@@ -216,20 +208,20 @@ TEST(ReferenceTwins, ReadToTheSameValues)
 			most = std::max(most, std::abs(i_rA(i / 4, i % 4) - i_rB(i / 4, i % 4)));
 		return most < 0.001f;
 	};
-	for (std::size_t i = 0; i < skins[0].m_pSkeleton->size(); ++i)
+	for (std::size_t i = 0; i < i_rSkins[0].m_pSkeleton->size(); ++i)
 	{
-		const VSkinBone& rA = (*skins[0].m_pSkeleton)[i];
-		const VSkinBone& rB = (*skins[1].m_pSkeleton)[i];
+		const VSkinBone& rA = (*i_rSkins[0].m_pSkeleton)[i];
+		const VSkinBone& rB = (*i_rSkins[1].m_pSkeleton)[i];
 		EXPECT_EQ(rA.m_Name, rB.m_Name);
 		EXPECT_EQ(rA.m_ParentIndex, rB.m_ParentIndex);
 		for (const auto member :
 		    {&VSkinBone::m_PreRotation, &VSkinBone::m_InverseBind, &VSkinBone::m_Local, &VSkinBone::m_Global})
 			EXPECT_TRUE(near(rA.*member, rB.*member)) << rA.m_Name;
 	}
-	for (std::size_t i = 0; i < skins[0].m_Meshes.size(); ++i)
+	for (std::size_t i = 0; i < i_rSkins[0].m_Meshes.size(); ++i)
 	{
-		const VSkinMesh& rA = skins[0].m_Meshes[i];
-		const VSkinMesh& rB = skins[1].m_Meshes[i];
+		const VSkinMesh& rA = i_rSkins[0].m_Meshes[i];
+		const VSkinMesh& rB = i_rSkins[1].m_Meshes[i];
 		ASSERT_EQ(rA.m_Parts.size(), rB.m_Parts.size());
 		for (std::size_t part = 0; part < rA.m_Parts.size(); ++part)
 		{
@@ -252,6 +244,70 @@ TEST(ReferenceTwins, ReadToTheSameValues)
 			EXPECT_NEAR(rP.m_TexCoord[0], rQ.m_TexCoord[0], 1e-5f);
 			EXPECT_NEAR(rP.m_TexCoord[1], rQ.m_TexCoord[1], 1e-5f);
 		}
+	}
+}
+
+/// What one exporter wrote of one character in binary and as text, which has fewer digits: closer to each other than to
+/// what other programs find.
+TEST(ReferenceTwins, ReadToTheSameValues)
+{
+	VSkin skins[2];
+	for (const int i : {0, 1})
+	{
+		FBXReader reader;
+		ASSERT_TRUE(reader.LoadFile(c_Folder + (i == 0 ? "own_ns_yup_cm_a7400.fbx" : "own_ns_yup_cm_b7400.fbx")));
+		reader.ReadSkin(skins[i]);
+	}
+	ExpectEqual(skins);
+}
+
+TEST(ReferenceTwins, OfOldVersionsReadToTheSameValues)
+{
+	std::vector<VPlacedMesh> meshes[2];
+	for (const int i : {0, 1})
+	{
+		FBXReader reader;
+		ASSERT_TRUE(reader.LoadFile(c_Folder + (i == 0 ? "ufbx_max_blob_a5800.fbx" : "ufbx_max_blob_b5800.fbx")));
+		EXPECT_TRUE(reader.IsComplete());
+		reader.ReadPlacedMeshes(meshes[i]);
+	}
+	ASSERT_EQ(meshes[0].size(), 17u);
+	ASSERT_EQ(meshes[1].size(), 17u);
+	for (std::size_t i = 0; i < meshes[0].size(); ++i)
+	{
+		const VPlacedMesh& rA = meshes[0][i];
+		const VPlacedMesh& rB = meshes[1][i];
+		EXPECT_TRUE(qFuzzyCompare(rA.m_Transform, rB.m_Transform)) << i;
+		ASSERT_EQ(rA.m_Mesh.m_Vertices.size(), rB.m_Mesh.m_Vertices.size());
+		for (std::size_t vertex = 0; vertex < rA.m_Mesh.m_Vertices.size(); ++vertex)
+			for (int axis = 0; axis < 3; ++axis)
+				EXPECT_NEAR(rA.m_Mesh.m_Vertices[vertex].m_Position[axis],
+				    rB.m_Mesh.m_Vertices[vertex].m_Position[axis], 1e-3f);
+		ASSERT_EQ(rA.m_Mesh.m_Parts.size(), i == 0 ? 7u : 1u);
+		for (std::size_t part = 0; part < rA.m_Mesh.m_Parts.size(); ++part)
+			EXPECT_EQ(rA.m_Mesh.m_Parts[part].m_Indices, rB.m_Mesh.m_Parts[part].m_Indices);
+	}
+}
+
+/// The same content as version 6.1 and as version 5 has it.
+TEST(OldVersions, SkinsAreThoseOfNewerFiles)
+{
+	using namespace FbxTest;
+	for (const EForm form : {EForm::Binary, EForm::Text})
+	{
+		SCOPED_TRACE(int(form));
+		VSkin skins[2];
+		for (const int i : {0, 1})
+		{
+			const VSmallFile file{"", {"", form, i == 0 ? 6100u : 5800u}};
+			const std::string bytes = Write(file.m_Form, SmallRecords(file));
+			FBXReader reader;
+			ASSERT_TRUE(reader.LoadMemory(bytes, "PATH"));
+			EXPECT_TRUE(reader.IsComplete());
+			reader.ReadSkin(skins[i]);
+		}
+		ASSERT_EQ(skins[0].m_Meshes.size(), 1u);
+		ExpectEqual(skins);
 	}
 }
 

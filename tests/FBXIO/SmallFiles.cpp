@@ -248,12 +248,54 @@ void ChangeValue(VList& io_rRecords, std::mt19937& io_rRandom)
 
 } // namespace
 
+/// As version 5 has the same content.
+static VList OldRecords(const VNumbers& i_rMatrix)
+{
+	const auto transform = [](double i_Y)
+	{
+		const auto axis = [](const char* i_pName, double i_Default)
+		{ return Record("Channel", {i_pName}, {Record("Default", {i_Default})}); };
+		return Record("Channel", {"Transform"}, {Record("Channel", {"T"}, {axis("X", 0), axis("Y", i_Y)})});
+	};
+	const auto link = [&](const char* i_pBone, VIntegers i_Points, VNumbers i_Weights)
+	{
+		return Record("Link", {i_pBone},
+		    {Record("Indexes", {std::move(i_Points)}), Record("Weights", {std::move(i_Weights)}),
+		        Record("Transform", {i_rMatrix}), Record("TransformLink", {i_rMatrix})});
+	};
+	const auto take = [&](const char* i_pName, double i_Y)
+	{
+		return Record("Take", {i_pName},
+		    {Record("Model", {"hips"}, {transform(9)}), Record("Model", {"knee"}, {transform(i_Y)})});
+	};
+	return {Record("FBXHeaderExtension", {}, {Record("FBXVersion", {5800})}),
+	    Record("Model", {"body"},
+	        {Record("Material", {"first"}, {Record("Diffuse", {1.0, 0.5, 0.0})}),
+	            Record("Material", {"second"}, {Record("ShadingModel", {"lambert"})}),
+	            Record("Texture", {"picture"}, {Record("RelativeFilename", {"none.png"})}),
+	            Record("Vertices", {VNumbers{0, 0, 0, 1, 0, 0, 0, 1, 0, 1, 1, 0}}),
+	            Record("Normals", {VNumbers{0, 0, 1, 0, 0, 1, 0, 0, 1, 0, 0, 1}}),
+	            Record("MaterialAssignation", {"ByPolygon"}), Record("Materials", {VIntegers{0, 1}}),
+	            Record("PolygonVertexIndex", {VIntegers{0, 1, -3, 1, 3, -3}}),
+	            Record("GeometryUVInfo", {},
+	                {Record("MappingInformationType", {"ByPolygon"}),
+	                    Record("TextureUV", {VNumbers{0, 0, 1, 0, 0, 1, 1, 1}}),
+	                    Record("TextureUVVerticeIndex", {VIntegers{0, 1, 2, 1, 3, 2}})}),
+	            link("hips", {0, 1, 2}, {1, 0.5, 0.25}), link("knee", {1, 2, 3}, {0.5, 0.75, 1})}),
+	    Record("Model", {"knee"}, {Record("Type", {"LimbNode"})}),
+	    Record("Model", {"hips"},
+	        {Record("TypeFlags", {"Skeleton"}), transform(0), Record("Children", {"knee", "nobody"})}),
+	    Record("Takes", {}, {Record("Current", {"second"}), take("first", 7), take("second", 5)})};
+}
+
 std::vector<VTestRecord> FbxTest::SmallRecords(const VSmallFile& i_rFile)
 {
 	const VTestScene scene{{{"hips", "LimbNode", -1, {}}, {"knee", "LimbNode", 0, {{"Lcl Translation", {0, 5, 0}}}},
 	                           {"body", "Mesh", -1, {}}},
 	    {{"UpAxis", {2}}}, {}, {}};
 	const VNumbers matrix{1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 0, 5, 0, 1};
+	if (i_rFile.m_Form.m_Version < 6000)
+		return OldRecords(matrix);
 	std::vector<VTestRecord> records = Records(i_rFile.m_Form, scene,
 	    {{2, {0, 0, 0, 1, 0, 0, 0, 1, 0, 1, 1, 0}, {0, 1, -3, 1, 3, -3},
 	        {"ByVertice", "Direct", {0, 0, 1, 0, 0, 1, 0, 0, 1, 0, 0, 1}, {}},

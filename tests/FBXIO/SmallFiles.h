@@ -19,7 +19,7 @@ struct VSmallFile
 
 inline constexpr VSmallFile c_SmallFiles[]{{"Binary6100", c_Forms[0]}, {"Binary7400", c_Forms[1]},
     {"Binary7500", c_Forms[2]}, {"Text6100", c_Forms[3]}, {"Text7400", c_Forms[4]},
-    {"PlainArrays", {"Binary7700", EForm::Binary, 7700}, true}};
+    {"PlainArrays", {"Binary7700", EForm::Binary, 7700}, true}, {"Binary5800", {"Binary5800", EForm::Binary, 5800}}};
 
 /// Two triangles with every kind of layer, two materials, a texture, on two bones.
 std::vector<VTestRecord> SmallRecords(const VSmallFile& i_rFile);

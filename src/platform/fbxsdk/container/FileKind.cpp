@@ -46,6 +46,16 @@ std::uint32_t VersionOfRecord(std::string_view i_Head)
 	return version;
 }
 
+/// Binary files before version 6 have the number 3000 in front, and their own in a record.
+std::uint32_t VersionOfBinary(std::string_view i_Head, std::uint32_t i_InFront)
+{
+	constexpr std::string_view record = "FBXVersionI";
+	const std::size_t at = i_InFront < 6000 ? i_Head.find(record) : std::string_view::npos;
+	if (at != std::string_view::npos && i_Head.size() >= at + record.size() + sizeof(i_InFront))
+		std::memcpy(&i_InFront, i_Head.data() + at + record.size(), sizeof(i_InFront));
+	return i_InFront;
+}
+
 } // namespace
 
 FbxFormat::VFileKind FbxFormat::DetectFileKind(std::string_view i_Head)
@@ -58,7 +68,7 @@ FbxFormat::VFileKind FbxFormat::DetectFileKind(std::string_view i_Head)
 		std::uint32_t version = 0;
 		std::memcpy(&version, i_Head.data() + 23, sizeof(version));
 		if (i_Head[22] == 0)
-			return {EFileKind::Binary, version};
+			return {EFileKind::Binary, VersionOfBinary(i_Head, version)};
 		return {EFileKind::BinaryBigEndian, __builtin_bswap32(version)};
 	}
 

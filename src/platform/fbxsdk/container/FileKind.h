@@ -19,7 +19,8 @@ enum class EFileKind
 struct VFileKind
 {
 	EFileKind m_Kind = EFileKind::None;
-	/// Major times 1000, minor times 100, revision times 10: 7400 is 7.4.0. 0 if the file does not tell.
+	/// Major times 1000, minor times 100, revision times 10: 7400 is 7.4.0. 0 if the file does not tell. Old binary
+	/// files have another number for their records than for themselves: this is the file's.
 	std::uint32_t m_Version = 0;
 };
 
@@ -27,7 +28,7 @@ struct VFileKind
 VFileKind DetectFileKind(std::string_view i_Head);
 
 /// The oldest and the first too new version that are read.
-inline constexpr std::uint32_t c_OldestVersion = 6000;
+inline constexpr std::uint32_t c_OldestVersion = 5000;
 inline constexpr std::uint32_t c_TooNewVersion = 8000;
 
 /// The length of the magic, the byte order and the version of a binary file: its records follow.

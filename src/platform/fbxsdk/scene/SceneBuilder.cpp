@@ -3,6 +3,7 @@
 #include "DebugServices/GlobalLog.h"
 #include "fbxsdk/Limits.h"
 #include "fbxsdk/container/Values.h"
+#include "fbxsdk/document/OldDocument.h"
 #include "fbxsdk/document/Properties.h"
 #include "fbxsdk/scene/LegacyTextures.h"
 #include "fbxsdk/scene/MaterialReader.h"
@@ -10,6 +11,7 @@
 #include "fbxsdk/sdk/NodeData.h"
 #include "fbxsdk/sdk/SceneContent.h"
 
+#include <algorithm>
 #include <optional>
 #include <set>
 
@@ -107,12 +109,23 @@ FbxFormat::VImportResult FbxFormat::VSceneBuilder::Build(
 	}
 	if (!io_rProgress.Tell(90.0f, "Building the scene"))
 		return result;
+	VFileKind kind = i_rKind;
+	if (kind.m_Version < c_FirstVersionWithObjects)
+	{
+		result.m_Error = rContent.m_Tree.Error();
+		result.m_bBeyondLimit = rContent.m_Tree.IsBeyondLimit();
+		const std::string written = WithObjects(rContent.m_Tree);
+		std::ranges::copy(written, rContent.m_Bytes.Resize(written.size()));
+		kind.m_Version = c_WrittenVersion;
+		rContent.m_Tree = {};
+		rContent.m_Tree.Read(rContent.m_Bytes.View(), kind);
+	}
 	rContent.m_pDocument = std::make_unique<VDocument>(rContent.m_Tree);
 	if (rContent.m_pDocument->Nameless() > 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning, "Objects left out because they have neither number nor name: %1%",
 		    rContent.m_pDocument->Nameless());
 	BuildSettings();
-	const std::string beyond = BuildObjects(i_rKind.m_Version);
+	const std::string beyond = BuildObjects(kind.m_Version);
 	Connect();
 	TellUnreached();
 	for (const auto& [rError, bBeyondLimit] :

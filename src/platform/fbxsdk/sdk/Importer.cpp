@@ -99,7 +99,7 @@ bool fbxsdk::FbxImporter::AcceptsHead(const FbxFormat::VFileBytes& i_rHead)
 	if (kind.m_Kind == EFileKind::BinaryBigEndian)
 		return Fail(FbxStatus::eInvalidFile, "File is written in big-endian byte order, which is not read");
 	if (kind.m_Version < FbxFormat::c_OldestVersion || kind.m_Version >= FbxFormat::c_TooNewVersion)
-		return Fail(FbxStatus::eInvalidFileVersion, "File version is not one of 6.0 to 7.9");
+		return Fail(FbxStatus::eInvalidFileVersion, "File version is not one of 5.0 to 7.9");
 	m_bInitialized = true;
 	m_Status = {};
 	return true;
