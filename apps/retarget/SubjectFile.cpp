@@ -28,7 +28,7 @@ bool TryReadSubjectFile(const std::string& i_rPath, VSubjectFile& o_rFile)
 		o_rFile.m_Extras = session.Document().GetTargetExtras();
 		return true;
 	}
-	CoreOrlexQRTIO::VReader reader;
+	CoreOrlexQRTIO::VReader reader(/*i_bNamespacesAreDetails*/ true);
 	return reader.Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId,
 	    o_rFile.m_Record.m_SubjectParametrised, o_rFile.m_Record.m_SubjectApplicationData, o_rFile.m_Extras);
 }

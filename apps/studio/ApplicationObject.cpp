@@ -12,7 +12,9 @@ VApplicationObject::VApplicationObject(std::shared_ptr<const VPreferences> i_pPr
 
 TesselPluginInterface::VHostRules VApplicationObject::Rules() const
 {
-	return {};
+	TesselPluginInterface::VHostRules rules;
+	rules.m_bNamespacesAreDetails = true;
+	return rules;
 }
 
 bool VApplicationObject::MayReplaceTargetSubject(const std::string& i_rAction)

@@ -1,3 +1,4 @@
+#include "../UtilsFileSystem/Log.h"
 #include "Content.h"
 
 #include "CoreOrlexTypes/JointType.h"
@@ -360,9 +361,14 @@ TEST_F(WrittenFile, IsWhatTheWriterSays)
 	EXPECT_EQ(Write(path, MakeContent(), &errors), NVX::Status::c_Success);
 	EXPECT_EQ(errors, VTexts());
 	EXPECT_TRUE(Get(path) == WriteText(MakeContent()));
-	VContent content;
-	EXPECT_TRUE(
-	    VReader().Read(path, "Template", c_TestId, content.m_Subject, content.m_ApplicationData, content.m_Extras));
+	VTestLog log("QRTIO");
+	for (const auto& [bDetails, pLevel] : {std::pair{false, "3 "}, std::pair{true, "6 "}})
+	{
+		VContent content;
+		EXPECT_TRUE(VReader(bDetails).Read(
+		    path, "Template", c_TestId, content.m_Subject, content.m_ApplicationData, content.m_Extras));
+		EXPECT_EQ(log.Take(), VTexts({pLevel + c_WrittenFileWarnings[0], pLevel + c_WrittenFileWarnings[1]}));
+	}
 }
 
 TEST_F(WrittenFile, StaysWhenTheSubjectCannotBeWritten)

@@ -22,16 +22,20 @@ namespace
 {
 
 /// Walks the document's elements.
-void ReadTree(UtilsRapidXml::VDocument& i_rDocument, VReading& io_rReading, VTexts& o_rErrors, VTexts& o_rWarnings)
+void ReadTree(UtilsRapidXml::VDocument& i_rDocument, bool i_bNamespacesAreDetails, VReading& io_rReading,
+    VTexts& o_rErrors, VTexts& o_rWarnings)
 {
 	std::shared_ptr<UtilsRapidXml::VReaderNode::VGlobalInfo> pGlobal;
 	{
 		UtilsRapidXml::VReaderNode root(i_rDocument, false);
 		pGlobal = root.GetGlobalInfo();
+		pGlobal->m_bNamespacesAreDetails = i_bNamespacesAreDetails;
 		FormatDocument(root, io_rReading);
 	}
 	o_rErrors = pGlobal->m_Errors.GetTexts();
 	o_rWarnings = pGlobal->m_Warnings.GetTexts();
+	for (const std::string& rDetail : pGlobal->m_Details.GetTexts())
+		NVX_LOG("QRTIO", NVX::ELogDetail, "%1%", rDetail);
 }
 
 } // namespace
@@ -62,7 +66,7 @@ bool VReader::ReadText(std::string i_Text, const std::string& i_rSubjectName, st
 		o_rWarnings.push_back(reason);
 		return false;
 	}
-	ReadTree(document, reading, o_rErrors, o_rWarnings);
+	ReadTree(document, m_bNamespacesAreDetails, reading, o_rErrors, o_rWarnings);
 
 	CoreOrlexTypesUtils::VDynamicExpressionParserSimple parser;
 	if (!CheckExpressions(parser, reading, o_rErrors, o_rWarnings))

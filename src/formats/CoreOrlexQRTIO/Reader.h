@@ -19,6 +19,10 @@ inline constexpr std::uint32_t c_HashedIds = 0xFFFFFFFFu;
 class VReader
 {
 public:
+	/// @param i_bNamespacesAreDetails what is told of the attributes xmlns:* and xsi:*, which every written file has
+	/// and the format does not declare, is no warning but goes to the log as a detail.
+	explicit VReader(bool i_bNamespacesAreDetails = false) : m_bNamespacesAreDetails(i_bNamespacesAreDetails) {}
+
 	/// Warnings and errors go to the log category "QRTIO". On false the outputs are empty or partly filled.
 	/// @param i_SubjectId c_HashedIds makes the ids of subject, markers and rotations hashes of their names; with any
 	/// other id those of markers and rotations are counts.
@@ -41,6 +45,9 @@ public:
 
 	/// Writes the schema to a file. False, with the reason in the log category "QRTIO", if that failed.
 	bool WriteSchema(const boost::filesystem::path& i_rPath);
+
+private:
+	bool m_bNamespacesAreDetails;
 };
 
 } // namespace CoreOrlexQRTIO

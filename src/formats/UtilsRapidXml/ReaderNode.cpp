@@ -39,6 +39,12 @@ std::uint64_t Bit(std::string_view i_Name)
 	return std::uint64_t(1) << ((i_Name.size() * 7 + i_Name.back() * 3 + i_Name.front()) % 64);
 }
 
+/// Attributes of XML itself, which many programs write and no format declares.
+bool IsOfNamespaces(std::string_view i_Name)
+{
+	return i_Name == "xmlns" || i_Name.starts_with("xmlns:") || i_Name.starts_with("xsi:");
+}
+
 bool Contains(const std::vector<std::string_view>& i_rNames, std::string_view i_Name)
 {
 	return std::find(i_rNames.begin(), i_rNames.end(), i_Name) != i_rNames.end();
@@ -83,8 +89,11 @@ VReaderNode::~VReaderNode()
 		if (next != rRecognised.end() && *next == pAttribute->name())
 			++next;
 		else if (std::find(rRecognised.begin(), rRecognised.end(), pAttribute->name()) == rRecognised.end())
-			m_pGlobal->m_Warnings.Add("Ignoring unrecognised attribute: %1%",
-			    [&] { return (Path(m_pElement) += '/') += UtilsRapidXml::Name(pAttribute); });
+			(m_pGlobal->m_bNamespacesAreDetails && IsOfNamespaces(UtilsRapidXml::Name(pAttribute))
+			        ? m_pGlobal->m_Details
+			        : m_pGlobal->m_Warnings)
+			    .Add("Ignoring unrecognised attribute: %1%",
+			        [&] { return (Path(m_pElement) += '/') += UtilsRapidXml::Name(pAttribute); });
 	m_pNotes->m_Pending.clear();
 	m_pNotes->m_RecognisedChildren.clear();
 	m_pNotes->m_RecognisedAttributes.clear();

@@ -51,6 +51,9 @@ public:
 		VVersion m_Version;
 		VMessages m_Errors;
 		VMessages m_Warnings;
+		/// Takes the place of m_Warnings for attributes that belong to XML itself, if that is wanted.
+		VMessages m_Details;
+		bool m_bNamespacesAreDetails = false;
 		bool m_bStrictOrder = false;
 		/// The values of all xsd:ID attributes read so far; they point into the document.
 		std::unordered_set<std::string_view> m_Ids;

@@ -195,8 +195,8 @@ bool VRetargetSetup::LoadSourceSubject(const boost::filesystem::path& i_rPath, c
 	VSubjectParametrised subject;
 	VSubjectApplicationData applicationData;
 	CoreOrlexQRTIO::VSubjectQRTExtras extras;
-	if (!CoreOrlexQRTIO::VReader().Read(
-	        i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId, subject, applicationData, extras))
+	if (!CoreOrlexQRTIO::VReader(HostRules().m_bNamespacesAreDetails)
+	         .Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId, subject, applicationData, extras))
 		return false;
 	applicationData.m_Skin = i_rSkinName;
 	if (RetargetSetup::LacksBindPose(subject))
@@ -226,8 +226,9 @@ std::uint32_t VRetargetSetup::LoadTargetSubject(const boost::filesystem::path& i
 		if (const std::uint32_t status = RetargetSetup::ReadLegacyFile(i_rPath, record))
 			return status;
 	}
-	else if (!CoreOrlexQRTIO::VReader().Read(
-	             i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId, rSubject, rApplicationData, extras))
+	else if (!CoreOrlexQRTIO::VReader(HostRules().m_bNamespacesAreDetails)
+	              .Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId, rSubject, rApplicationData,
+	                  extras))
 		return NVX::Status::c_Failure;
 	if (RetargetSetup::LacksBindPose(rSubject))
 		RetargetSetup::AdoptTPoseAsBindPose(rSubject);

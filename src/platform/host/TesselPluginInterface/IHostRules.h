@@ -17,6 +17,9 @@ struct VHostRules
 	/// With joint symmetry a pose whose two sides' frames are no mirror images of each other mirrors its change, not
 	/// itself.
 	bool m_bMirrorChange = false;
+	/// The attributes xmlns:* and xsi:* of a skeleton file, which every file that was written here has, are told as
+	/// details, not as warnings.
+	bool m_bNamespacesAreDetails = false;
 };
 
 /// What a host may give beyond the services that every host gives: the application object of such a host implements
