@@ -58,6 +58,7 @@ TEST(Document, TellsWhatIsNoXml)
 	    {"Character data", "<a><![CDATA[<b>]] ]]></a>", ""},
 	    {"Text within elements", "<a> text &amp; <b/> more </a>", ""},
 	    {"Document type by name", "<!DOCTYPE a SYSTEM 'a.dtd'><a/>", ""},
+	    {"Document type with what ends it in its identifiers", "<!DOCTYPE a PUBLIC \"[>'\" 'a>\n[b\">.dtd' ><a/>", ""},
 	    {"Unknown entity stays", "<a b='&x; & &'/>", ""},
 	    {"Blanks in tags", "<a\n\tb = '1'\r\n/><b ></b >", ""},
 	    {"As deep as it goes", Nested(c_MaximumDepth), ""},
@@ -115,6 +116,10 @@ TEST(Document, TellsWhatIsNoXml)
 	    {"Character data without an end", "<a><![CDATA[", "line 1: character data does not end"},
 	    {"Document type with entities", "<!DOCTYPE a [<!ENTITY x 'y'>]><a/>",
 	        "line 1: document type that is broken or has an internal subset"},
+	    {"Document type whose identifier does not end", "\n<!DOCTYPE a SYSTEM 'a>\n<a/>",
+	        "line 2: document type that is broken or has an internal subset"},
+	    {"Attribute twice after values of shortened line ends", "<a c='\r\n\r\n' b='' \n b=''/>",
+	        "line 4: attribute b stands twice"},
 	    {"Other declaration", "<!x><a/>", "line 1: element without a name"},
 	};
 	for (const VDocumentRow& rRow : c_Rows)
@@ -132,7 +137,7 @@ TEST(Document, KeepsAttributeTextsThroughParseAndPrint)
 	VDocument document;
 	std::string error;
 	ASSERT_TRUE(
-	    document.Parse("<a b='1\n2\t&#10;&#9;&#13;&lt;&gt;&amp;&quot;&apos;&x;'><c d='\"' e=\"'\"/></a>", error));
+	    document.Parse("<a b='1\r\n2\t&#10;&#9;&#13;&lt;&gt;&amp;&quot;&apos;&x;'><c d='\"' e=\"'\"/></a>", error));
 	VDocument again;
 	ASSERT_TRUE(again.Parse(document.Print(), error)) << error;
 	EXPECT_EQ(again.Print(), "<a b='1 2 &#10;&#9;&#13;&lt;&gt;&amp;\"&apos;&amp;x;'>\n\t<c d='\"' e=\"'\"/>\n</a>\n\n");

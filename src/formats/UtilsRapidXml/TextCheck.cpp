@@ -111,10 +111,11 @@ private:
 	}
 
 	bool Markup();
+	bool DocumentType();
 	bool Opening();
 	bool Closing();
 	bool Attribute();
-	bool Value(char* i_pBegin, char* i_pEnd);
+	bool Value(char* i_pBegin, char*& io_rpEnd);
 	bool DuplicateAttribute();
 	bool Text(const char* i_pBegin, const char* i_pEnd);
 	bool Reference(const char* i_pAt);
@@ -170,15 +171,31 @@ bool VTextCheck::Markup()
 	if (Take("<![CDATA["))
 		return SkipPast("]]>", "character data");
 	if (Take("<!DOCTYPE"))
-	{
-		const std::size_t stop = std::string_view(m_p, m_pEnd - m_p).find_first_of("[>");
-		if (m_p == m_pEnd || !IsSpace(*m_p) || stop == std::string_view::npos || m_p[stop] == '[')
-			return Fail(m_p, "document type that is broken or has an internal subset");
-		m_p += stop + 1;
-		return true;
-	}
+		return DocumentType();
 	++m_p;
 	return Opening();
+}
+
+/// Blanks its identifiers out, which may hold what would end it, and which nothing asks for.
+bool VTextCheck::DocumentType()
+{
+	const char* const pAt = m_p;
+	const auto fail = [&] { return Fail(pAt, "document type that is broken or has an internal subset"); };
+	if (m_p == m_pEnd || !IsSpace(*m_p))
+		return fail();
+	while (m_p != m_pEnd && *m_p != '>' && *m_p != '[')
+	{
+		const char quote = *m_p++;
+		if (quote != '"' && quote != '\'')
+			continue;
+		char* const pQuote = std::find(m_p, m_pEnd, quote);
+		if (pQuote == m_pEnd)
+			return fail();
+		std::replace_if(
+		    m_p, pQuote, [](char i_Byte) { return i_Byte != '\n'; }, ' ');
+		m_p = pQuote + 1;
+	}
+	return Take(">") || fail();
 }
 
 bool VTextCheck::Opening()
@@ -233,29 +250,36 @@ bool VTextCheck::Attribute()
 	char* const pBegin = m_p;
 	char* const pQuote = static_cast<char*>(std::memchr(pBegin, quote, m_pEnd - pBegin));
 	m_p = pQuote ? pQuote : m_pEnd;
-	if (!IsPlainValue({pBegin, m_p}) && !Value(pBegin, m_p))
+	char* pEnd = m_p;
+	if (!IsPlainValue({pBegin, pEnd}) && !Value(pBegin, pEnd))
 		return false;
 	if (!pQuote)
 		return Fail(pBegin, "value of attribute " + std::string(name) + " does not end");
 	++m_p;
+	if (pEnd != pQuote)
+	{
+		*pEnd = quote;
+		std::fill(pEnd + 1, m_p, ' ');
+	}
 	SkipSpace();
 	return true;
 }
 
-/// Checks references, and turns white space into blanks.
-bool VTextCheck::Value(char* i_pBegin, char* i_pEnd)
+/// Checks references, and turns white space into blanks, a line end of two bytes into one.
+/// @param io_rpEnd moves to where the value ends then.
+bool VTextCheck::Value(char* i_pBegin, char*& io_rpEnd)
 {
-	for (char* p = i_pBegin; p != i_pEnd; ++p)
-		if (*p == '&')
-		{
-			if (!Reference(p))
-				return false;
-		}
-		else if (IsSpace(*p))
-		{
-			m_LineEndsReplaced += *p == '\n';
-			*p = ' ';
-		}
+	char* pOut = i_pBegin;
+	for (char* p = i_pBegin; p != io_rpEnd; ++p)
+	{
+		if (*p == '&' && !Reference(p))
+			return false;
+		if (*p == '\r' && p + 1 != io_rpEnd && p[1] == '\n')
+			continue;
+		m_LineEndsReplaced += *p == '\n';
+		*pOut++ = IsSpace(*p) ? ' ' : *p;
+	}
+	io_rpEnd = pOut;
 	return true;
 }
 
