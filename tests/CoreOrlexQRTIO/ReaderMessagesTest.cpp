@@ -269,7 +269,7 @@ const std::vector<VMessageRow> c_MessageRows{
         {"TargetLocalRotationToWorldRotation node's AXIS attribute had incorrect number of components"}},
     {"DirectionNotUnit",
         Targets("<TargetLocalDirectionToWorldDirection HIDDEN='false' SEGMENT='Root' WEIGHT='1' "
-                "DIRECTION-OBSERVATION='o' DIRECTION='0 0 1.1'/>"),
+                "DIRECTION-OBSERVATION='o' DIRECTION='0 0 1.0006'/>"),
         {"Direction target state has to be a unit vector"}},
     {"DirectionNearlyUnit",
         Targets("<TargetLocalDirectionToWorldDirection HIDDEN='false' SEGMENT='Root' WEIGHT='1' "

@@ -113,6 +113,17 @@ private:
 		return matrix;
 	}
 
+	/// Half of them on the edge, where rounding makes an eigenvalue negative.
+	std::vector<double> Semidefinite(std::size_t i_Size)
+	{
+		if (Below(2))
+			return Definite(i_Size);
+		std::vector<double> matrix(i_Size * i_Size, 0.0);
+		for (std::size_t i = 0; i < i_Size; ++i)
+			matrix[i * (i_Size + 1)] = i == 0 ? 3 : Below(3);
+		return matrix;
+	}
+
 	void AddSegment(VSubjectParametrised& io_rSubject, std::uint32_t i_Index)
 	{
 		AddSegment(io_rSubject, i_Index, i_Index == 0 ? VJoint::EFree : VJoint::EJointType(Below(6)));
@@ -169,10 +180,10 @@ private:
 			rTarget.m_Covariance = rTarget.m_TemplateCovariance = {4, 1, 1, 4};
 		else if (i_Type == VTarget::ELocalPointToWorldPointGaussian || i_Type == VTarget::ERigidBody)
 		{
-			rTarget.m_Covariance = Definite(i_Type == VTarget::ERigidBody ? 6 : 3);
+			rTarget.m_Covariance = Semidefinite(i_Type == VTarget::ERigidBody ? 6 : 3);
 			for (std::size_t i = 0; i_Type == VTarget::ERigidBody && i < i_Markers.size(); ++i)
 			{
-				const std::vector<double> block = Definite(3);
+				const std::vector<double> block = Semidefinite(3);
 				rTarget.m_Covariance.insert(rTarget.m_Covariance.end(), block.begin(), block.end());
 			}
 			rTarget.m_TemplateCovariance = rTarget.m_Covariance;
@@ -241,4 +252,67 @@ inline std::map<std::string, VPoints> WorldPoints(const CoreOrlexTypes::VSubject
 	CoreOrlexTypes::VSubject evaluated;
 	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(i_rSubject, evaluated);
 	return WorldPoints(evaluated);
+}
+
+/// How uncertain the targets are of each marker, and from where they see it, in the world: of each marker name the
+/// covariances of points and rigid bodies (9 values) and the view normals, of each body its pose's covariance (36),
+/// with the orientation's part about its own axes.
+inline std::map<std::string, std::vector<double>> WorldSights(const CoreOrlexTypes::VSubject& i_rSubject)
+{
+	using Rotation::VMatrix3;
+	ComputeSubject::VComputeSubjectFK fk(i_rSubject);
+	std::vector<double> state;
+	for (const auto& rSegment : i_rSubject.m_Segments)
+		state.insert(state.end(), rSegment.m_Joint.m_Mean.begin(), rSegment.m_Joint.m_Mean.end());
+	fk.Update(state.data());
+	std::map<std::string, std::vector<double>> sights;
+	// Left C Right', of the block at an entry of a matrix of that many columns.
+	const auto add = [](std::vector<double>& io_rSight, const VMatrix3& i_rLeft, const VMatrix3& i_rRight,
+	                     const std::vector<double>& i_rMatrix, std::size_t i_Begin, std::size_t i_Columns)
+	{
+		VMatrix3 block;
+		for (std::size_t i = 0; i < 9; ++i)
+			block[i] = i_rMatrix[i_Begin + i / 3 * i_Columns + i % 3];
+		block = Rotation::Product(i_rLeft, Rotation::Product(block, Rotation::Transposed(i_rRight)));
+		io_rSight.insert(io_rSight.end(), block.begin(), block.end());
+	};
+	for (const auto& rTarget : i_rSubject.m_Targets)
+	{
+		using VTarget = CoreOrlexTypes::VSubject::VTarget;
+		const auto& rSegment = fk.Segment(rTarget.m_SegmentIndices[0]);
+		const VMatrix3 world = Rotation::Product(rSegment.WorldPose().R, rSegment.PostPose().R);
+		const bool bBody = rTarget.m_Type == VTarget::ERigidBody;
+		const VMatrix3 body = bBody
+		    ? Rotation::RotationMatrixFromAngleAxis({rTarget.m_State[3], rTarget.m_State[4], rTarget.m_State[5]})
+		    : Rotation::c_Identity3;
+		for (std::size_t i = 0; i < rTarget.m_MarkerIndices.size(); ++i)
+		{
+			auto& rSight = sights[i_rSubject.m_Markers[rTarget.m_MarkerIndices[i]].m_Name];
+			const Rotation::VVector3 normal = Rotation::Product(world, rTarget.m_ViewNormals[i]);
+			rSight.insert(rSight.end(), normal.begin(), normal.end());
+			const VMatrix3 toWorld = Rotation::Product(world, body);
+			if (bBody || rTarget.m_Type == VTarget::ELocalPointToWorldPointGaussian)
+				add(rSight, toWorld, toWorld, rTarget.m_Covariance, bBody ? 36 + 9 * i : 0, 3);
+		}
+		if (!bBody)
+			continue;
+		auto& rPose = sights["pose of " + i_rSubject.m_Markers[rTarget.m_MarkerIndices[0]].m_Name];
+		add(rPose, world, world, rTarget.m_Covariance, 0, 6);
+		add(rPose, world, Rotation::c_Identity3, rTarget.m_Covariance, 3, 6);
+		add(rPose, Rotation::c_Identity3, world, rTarget.m_Covariance, 18, 6);
+		add(rPose, Rotation::c_Identity3, Rotation::c_Identity3, rTarget.m_Covariance, 21, 6);
+	}
+	return sights;
+}
+
+/// @param i_bTemplate the template covariances.
+inline std::map<std::string, std::vector<double>> WorldSights(
+    CoreOrlexTypes::VSubjectParametrised i_Subject, bool i_bTemplate)
+{
+	for (auto& rTarget : i_Subject.m_Targets)
+		if (i_bTemplate)
+			rTarget.m_Covariance = rTarget.m_TemplateCovariance;
+	CoreOrlexTypes::VSubject evaluated;
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(i_Subject, evaluated);
+	return WorldSights(evaluated);
 }

@@ -36,6 +36,20 @@ void ExpectSamePoints(
 	}
 }
 
+void ExpectSameSights(const std::map<std::string, std::vector<double>>& i_rExpected,
+    const std::map<std::string, std::vector<double>>& i_rActual, unsigned i_Seed, bool i_bPoses)
+{
+	for (const auto& [name, sight] : i_rExpected)
+	{
+		if (!i_bPoses && name.starts_with("pose of "))
+			continue;
+		ASSERT_TRUE(i_rActual.count(name)) << name;
+		ASSERT_EQ(i_rActual.at(name).size(), sight.size());
+		for (std::size_t i = 0; i < sight.size(); ++i)
+			EXPECT_NEAR(i_rActual.at(name)[i], sight[i], 1e-9) << i_Seed << ' ' << name << ' ' << i;
+	}
+}
+
 class RigidBody : public testing::Test
 {
 protected:
@@ -156,8 +170,16 @@ TEST_F(RigidBody, LayoutsThereAndBack)
 		VSubject evaluated;
 		ASSERT_TRUE(SubjectParametrisedConverter::ConvertSubject(m_Body, evaluated));
 		const auto before = WorldPoints(m_Body);
+		const auto sights = WorldSights(evaluated);
+		const auto expectSameSights = [&]
+		{
+			ExpectSameSights(sights, WorldSights(evaluated), seed, false);
+			ExpectSameSights(sights, WorldSights(m_Body, false), seed, false);
+			ExpectSameSights(sights, WorldSights(m_Body, true), seed, false);
+		};
 		ASSERT_TRUE(ToPointTargets(m_Body, m_AppData));
 		ASSERT_TRUE(ToPointTargets(evaluated));
+		expectSameSights();
 		EXPECT_TRUE(CheckSubjectParametrised(m_Body));
 		EXPECT_EQ(m_Body.m_Targets.size(), m_Body.m_Markers.size());
 		EXPECT_EQ(m_AppData.m_Targets.size(), m_Body.m_Targets.size());
@@ -169,6 +191,7 @@ TEST_F(RigidBody, LayoutsThereAndBack)
 		ASSERT_TRUE(ToRigidBodyTarget(evaluated));
 		EXPECT_TRUE(CheckSubjectParametrised(m_Body));
 		EXPECT_EQ(m_AppData.m_Targets.size(), 1u);
+		expectSameSights();
 		ExpectSamePoints(before, WorldPoints(m_Body), seed);
 		ExpectSamePoints(before, WorldPoints(evaluated), seed);
 		ASSERT_TRUE(ToPointTargets(m_Body, m_AppData));
@@ -280,6 +303,8 @@ TEST_F(RigidBody, AttachAndRemoveOverRandomSubjects)
 		ASSERT_TRUE(SubjectParametrisedConverter::ConvertSubject(subject, evaluated));
 		ASSERT_TRUE(SubjectParametrisedConverter::ConvertSubject(m_Body, evaluatedBody));
 		VSubjectApplicationData evaluatedAppData = appData;
+		auto sights = WorldSights(evaluated);
+		sights.merge(WorldSights(evaluatedBody));
 
 		const std::uint32_t segment = random.Below(std::uint32_t(subject.m_Segments.size()));
 		const std::string name = subject.m_Segments[segment].m_Name;
@@ -290,6 +315,9 @@ TEST_F(RigidBody, AttachAndRemoveOverRandomSubjects)
 		points.insert(bodyPoints.begin(), bodyPoints.end());
 		ExpectSamePoints(points, WorldPoints(subject), seed);
 		ExpectSamePoints(points, WorldPoints(evaluated), seed);
+		ExpectSameSights(sights, WorldSights(evaluated), seed, true);
+		ExpectSameSights(sights, WorldSights(subject, false), seed, true);
+		ExpectSameSights(sights, WorldSights(subject, true), seed, true);
 		EXPECT_EQ(subject.m_Targets.back().m_SegmentIndices, std::vector<std::uint32_t>{segment});
 		EXPECT_EQ(appData.m_Markers.size(), subject.m_Markers.size());
 		EXPECT_EQ(appData.m_Targets.size(), subject.m_Targets.size());
@@ -359,8 +387,12 @@ TEST_F(RigidBody, AttachRefusesInOrderWithNothingChanged)
 	refuses({"2 Cannot attach rigid body to segment Nowhere the segment does not exist!"});
 	segment = "S0";
 	refuses({"2 Rigid body static parameter name clash: Arm"});
+	m_Body.m_StaticParameters[0].m_Name = "GlobalScale";
+	refuses({"2 Rigid body static parameter name clash: GlobalScale"});
 	m_Body.m_StaticParameters.clear();
 	refuses({"2 Rigid body dynamic parameter name clash: GlobalScale"});
+	m_Body.m_DynamicParameters[0].m_Name = "Arm";
+	refuses({"2 Rigid body dynamic parameter name clash: Arm"});
 	m_Body.m_DynamicParameters.clear();
 	refuses({"2 Cannot add this marker, duplicate name: M2"});
 	m_Body.m_Markers[1].m_Name = "P1";
@@ -370,6 +402,35 @@ TEST_F(RigidBody, AttachRefusesInOrderWithNothingChanged)
 	subject.m_Segments[0].m_Joint.m_Mean = {1};
 	EXPECT_FALSE(AttachRigidBody(subject, appData, m_Body, m_AppData, segment));
 	EXPECT_EQ(m_Log.TakeTroubles().back(), "2 Cannot compute the pose of subject Performer");
+}
+
+TEST_F(RigidBody, RemoveKeepsParametersThatAreUsedElsewhere)
+{
+	using VSegment = VSubjectParametrised::VSegment;
+	for (std::string& (*const pText)(VSegment&) :
+	    std::initializer_list<std::string& (*)(VSegment&)>{[](VSegment& i_r) -> std::string&
+	        { return i_r.m_PreTranslation[0]; },
+	        [](VSegment& i_r) -> std::string& { return i_r.m_Bounds[5]; },
+	        [](VSegment& i_r) -> std::string& { return i_r.m_MassExpression; },
+	        [](VSegment& i_r) -> std::string& { return i_r.m_MassCentreExpressions[0]; },
+	        [](VSegment& i_r) -> std::string& { return i_r.m_RadiusOfGyrationExpressions[0]; },
+	        [](VSegment& i_r) -> std::string& { return i_r.m_Name; }})
+	{
+		VSubjectParametrised subject;
+		VSubjectApplicationData appData;
+		VRandomSubject(5).Make(subject, appData);
+		subject.m_StaticParameters.emplace_back().m_Name = "Shared";
+		const auto body = std::ranges::find(subject.m_Targets, VTarget::ERigidBody, &VTarget::m_Type);
+		body->m_StateExpressions[0] = "Shared";
+		std::erase_if(subject.m_Targets,
+		    [](const VTarget& i_r) { return i_r.m_Type != VTarget::ERigidBody && !i_r.m_MarkerIndices.empty(); });
+		appData.m_Targets.resize(subject.m_Targets.size());
+		pText(subject.m_Segments[0]) = "Shared*2";
+		const bool bName = subject.m_Segments[0].m_Name == "Shared*2";
+		const auto index = std::ranges::find(subject.m_Targets, VTarget::ERigidBody, &VTarget::m_Type);
+		ASSERT_TRUE(RemoveRigidBody(subject, appData, std::size_t(index - subject.m_Targets.begin())));
+		EXPECT_EQ(subject.m_StaticParameters.back().m_Name == "Shared", !bName) << "a name is no use of it";
+	}
 }
 
 TEST_F(RigidBody, RemoveRefusesInOrder)

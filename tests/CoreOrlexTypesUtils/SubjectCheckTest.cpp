@@ -289,12 +289,12 @@ TEST_F(SubjectCheck, ValuesOfTargets)
 	        {"Incorrect rotation target orientation size. Expected 3. Actual 0 "}},
 	    {9,
 	        [](VTarget& io_r) {
-		        io_r.m_State = {1.001, 0, 0};
+		        io_r.m_State = {1.0006, 0, 0};
 	        },
 	        {unit}},
 	    {9,
 	        [](VTarget& io_r) {
-		        io_r.m_State = {0.999, 0, 0};
+		        io_r.m_State = {0.9994, 0, 0};
 	        },
 	        {unit}},
 	    {9,

@@ -69,6 +69,29 @@ EFault FaultAsSemidefinite(std::span<const double, t_Size * t_Size> i_Matrix)
 template EFault FaultAsSemidefinite<3>(std::span<const double, 9> i_Matrix);
 template EFault FaultAsSemidefinite<6>(std::span<const double, 36> i_Matrix);
 
+template <std::size_t t_Size>
+void TakeOffRounding(std::span<double, t_Size * t_Size> io_Matrix)
+{
+	// Of the largest eigenvalue: what may have been lost, and what is far enough from 0 not to be lost again.
+	constexpr double c_Rounding = 1e-12;
+	constexpr double c_Raised = 1e-14;
+	if (!AllFinite(io_Matrix) || IsZero(io_Matrix))
+		return;
+	std::array<double, t_Size * t_Size> matrix;
+	for (std::size_t row = 0; row < t_Size; ++row)
+		for (std::size_t column = 0; column < t_Size; ++column)
+			matrix[row * t_Size + column] = 0.5 * (io_Matrix[row * t_Size + column] + io_Matrix[column * t_Size + row]);
+	const fnl_symmetric_eigensystem<t_Size> eigen(matrix);
+	const double largest = eigen.Values().back();
+	if (eigen.Values().front() < 0.0 && eigen.Values().front() >= -c_Rounding * largest)
+		matrix = eigen.WithValuesOfAtLeast(c_Raised * largest);
+	std::ranges::copy(matrix, io_Matrix.begin());
+}
+
+template void TakeOffRounding<2>(std::span<double, 4> io_Matrix);
+template void TakeOffRounding<3>(std::span<double, 9> io_Matrix);
+template void TakeOffRounding<6>(std::span<double, 36> io_Matrix);
+
 EFault FaultAsDefinite(std::span<const double> i_Matrix, std::size_t i_Size)
 {
 	const EFault fault = FaultOfEntries(i_Matrix, i_Size);

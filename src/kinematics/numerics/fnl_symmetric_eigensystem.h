@@ -2,6 +2,7 @@
 
 #include "numerics/Lapack.h"
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 #include <limits>
@@ -36,6 +37,18 @@ public:
 	const std::array<double, t_Size>& Values() const { return m_Values; }
 	/// One eigenvector of length 1 in each row, in the order of the values.
 	const std::array<double, t_Size * t_Size>& Vectors() const { return m_Vectors; }
+
+	/// The matrix with each eigenvalue raised to at least this; symmetric to the last bit.
+	std::array<double, t_Size * t_Size> WithValuesOfAtLeast(double i_Smallest) const
+	{
+		std::array<double, t_Size * t_Size> matrix{};
+		for (std::size_t row = 0; row < t_Size; ++row)
+			for (std::size_t column = 0; column < t_Size; ++column)
+				for (std::size_t k = 0; k < t_Size; ++k)
+					matrix[row * t_Size + column] += std::max(m_Values[k], i_Smallest)
+					    * (m_Vectors[k * t_Size + row] * m_Vectors[k * t_Size + column]);
+		return matrix;
+	}
 
 private:
 	std::array<double, t_Size * t_Size> m_Vectors;

@@ -111,15 +111,9 @@ void KeepPositive(VNumbers& io_rCovariance)
 	const double smallest = c_SmallestEigenvalue * std::max(1.0, eigen.Values()[2]);
 	if (eigen.Values()[0] >= smallest)
 		return;
-	for (std::size_t row = 0; row < 3; ++row)
-		for (std::size_t column = 0; column < 3; ++column)
-		{
-			double sum = 0.0;
-			for (std::size_t k = 0; k < 3; ++k)
-				sum += std::max(eigen.Values()[k], smallest)
-				    * (eigen.Vectors()[3 * k + row] * eigen.Vectors()[3 * k + column]);
-			io_rCovariance[row * t_Size + column] = sum;
-		}
+	const VMatrix3 raised = eigen.WithValuesOfAtLeast(smallest);
+	for (std::size_t i = 0; i < 9; ++i)
+		io_rCovariance[i / 3 * t_Size + i % 3] = raised[i];
 }
 
 template <std::size_t t_Size, typename TEulerToAA>

@@ -15,6 +15,7 @@
 
 #include <algorithm>
 #include <set>
+#include <span>
 
 namespace CoreOrlexTypesUtils::RigidBodyUtils
 {
@@ -75,16 +76,17 @@ bool CanMergeParameters(const VSubject&, const VSubject&)
 
 bool CanMergeParameters(const VSubjectParametrised& i_rSubject, const VSubjectParametrised& i_rRigidBody)
 {
-	const auto has = [](const auto& i_rList, const std::string& i_rName)
-	{
-		return std::any_of(
-		    i_rList.begin(), i_rList.end(), [&](const auto& i_rParameter) { return i_rParameter.m_Name == i_rName; });
-	};
+	// Expressions tell static and dynamic parameters by their names alone.
+	std::set<std::string> names;
+	for (const auto& rParameter : i_rSubject.m_StaticParameters)
+		names.insert(rParameter.m_Name);
+	for (const auto& rParameter : i_rSubject.m_DynamicParameters)
+		names.insert(rParameter.m_Name);
 	for (const auto& rParameter : i_rRigidBody.m_StaticParameters)
-		if (has(i_rSubject.m_StaticParameters, rParameter.m_Name))
+		if (names.contains(rParameter.m_Name))
 			return Refuse("Rigid body static parameter name clash: %1%", rParameter.m_Name);
 	for (const auto& rParameter : i_rRigidBody.m_DynamicParameters)
-		if (has(i_rSubject.m_DynamicParameters, rParameter.m_Name))
+		if (names.contains(rParameter.m_Name))
 			return Refuse("Rigid body dynamic parameter name clash: %1%", rParameter.m_Name);
 	return true;
 }
@@ -140,6 +142,7 @@ void TurnPoseCovariance(const VMatrix3& i_rR, std::vector<double>& io_rCovarianc
 		io_rCovariance[i / 3 * 6 + 3 + i % 3] = mixed[i];
 		io_rCovariance[(3 + i % 3) * 6 + i / 3] = mixed[i];
 	}
+	MatrixValidity::TakeOffRounding<6>(std::span(io_rCovariance).first<36>());
 }
 
 void TurnTemplates(const VMatrix3&, VSubject::VTarget&) {}

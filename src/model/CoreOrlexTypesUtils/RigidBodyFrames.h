@@ -3,6 +3,7 @@
 #include "CoreOrlexTypes/Subject.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
 
+#include "numerics/MatrixValidity.h"
 #include "numerics/Rotation.h"
 
 /// How what a rigid body holds changes when it is given in another frame.
@@ -21,16 +22,13 @@ inline bool EvaluateSubject(
 	return SubjectParametrisedConverter::ConvertSubject(i_rSubject, o_rEvaluated);
 }
 
-/// R C R', symmetric to the last bit.
+/// R C R', symmetric to the last bit and without the negative eigenvalues of rounding.
 inline Rotation::VMatrix3 TurnedCovariance(const Rotation::VMatrix3& i_rR, const Rotation::VMatrix3& i_rCovariance)
 {
 	if (i_rR == Rotation::c_Identity3)
 		return i_rCovariance;
 	Rotation::VMatrix3 turned = Rotation::Product(i_rR, Rotation::Product(i_rCovariance, Rotation::Transposed(i_rR)));
-	for (std::size_t row = 0; row < 3; ++row)
-		for (std::size_t column = 0; column < row; ++column)
-			turned[3 * row + column] = turned[3 * column + row] =
-			    0.5 * (turned[3 * row + column] + turned[3 * column + row]);
+	MatrixValidity::TakeOffRounding<3>(turned);
 	return turned;
 }
 

@@ -312,13 +312,12 @@ private:
 		}
 		if (Follows(i_rAnalysis))
 			return true;
-		// The parser passes over a last token that has no meaning, which parentheses would give one.
-		std::string text = ScaledExpression(io_rText, m_Factor);
+		std::string text = ScaledExpression(io_rText, m_Factor).value_or("");
 		double value = 0.0;
 		std::string error;
 		m_Parser.Evaluate(text, value, error, i_Context);
 		const double expected = i_rAnalysis.m_Value * m_Factor;
-		const bool bGood = error.empty() && IsGood(value, i_rAnalysis.m_Value, io_rText)
+		const bool bGood = !text.empty() && error.empty() && IsGood(value, i_rAnalysis.m_Value, io_rText)
 		    && !(std::abs(value - expected) > 1e-9 * std::abs(expected));
 		if (!bGood)
 			NVX_LOG(c_Category, NVX::ELogError, "Cannot scale the length '%1%'", io_rText);

@@ -88,9 +88,21 @@ void TemplateSubjectUtils::ScaleTarget(VSubject::VTarget& io_rTarget, double i_F
 void SubjectParametrisedUtils::ScaleTarget(VSubjectParametrised::VTarget& io_rTarget, double i_Factor)
 {
 	TellUnscalableState<VSubjectParametrised>(io_rTarget);
-	for (std::size_t i = 0; i < io_rTarget.m_StateExpressions.size(); ++i)
-		if (IsLength(io_rTarget.m_Type, i))
-			io_rTarget.m_StateExpressions[i] = ScaledExpression(io_rTarget.m_StateExpressions[i], i_Factor);
+	std::vector<std::string> scaled = io_rTarget.m_StateExpressions;
+	for (std::size_t i = 0; i < scaled.size(); ++i)
+	{
+		if (!IsLength(io_rTarget.m_Type, i))
+			continue;
+		const std::optional<std::string> text = ScaledExpression(scaled[i], i_Factor);
+		if (!text)
+		{
+			NVX_LOG(VSubjectKind<VSubjectParametrised>::c_LogCategory, NVX::ELogError,
+			    "Cannot scale the length '%1%': the target stays as it is", scaled[i]);
+			return;
+		}
+		scaled[i] = *text;
+	}
+	io_rTarget.m_StateExpressions = std::move(scaled);
 	ScaleTargetStatistics<VSubjectParametrised>(io_rTarget, i_Factor, io_rTarget.m_Covariance,
 	    io_rTarget.m_TemplateCovariance, io_rTarget.m_PlacementCovariance);
 }

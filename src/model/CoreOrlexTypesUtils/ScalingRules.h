@@ -4,7 +4,10 @@
 
 #include "DebugServices/GlobalLog.h"
 
+#include "numerics/MatrixValidity.h"
+
 #include <cmath>
+#include <span>
 
 /// What of a target scales; the two subject types share it.
 namespace CoreOrlexTypesUtils
@@ -46,14 +49,15 @@ void TellUnscalableState(const typename TSubject::VTarget& i_rTarget)
 		NVX_LOG(c_Category, NVX::ELogError, "Unknown target type");
 }
 
-/// A covariance of the given number of lengths, the rest being angles: the lengths come first.
-inline void ScaleCovariance(std::vector<double>& io_rCovariance, std::size_t i_Begin, std::size_t i_Size,
-    std::size_t i_Lengths, double i_Factor)
+/// A covariance of t_Size values of which the first are lengths, the rest angles.
+template <std::size_t t_Size>
+void ScaleCovariance(std::span<double, t_Size * t_Size> io_Covariance, std::size_t i_Lengths, double i_Factor)
 {
-	for (std::size_t row = 0; row < i_Size; ++row)
-		for (std::size_t column = 0; column < i_Size; ++column)
-			io_rCovariance[i_Begin + row * i_Size + column] *=
+	for (std::size_t row = 0; row < t_Size; ++row)
+		for (std::size_t column = 0; column < t_Size; ++column)
+			io_Covariance[row * t_Size + column] *=
 			    (row < i_Lengths ? i_Factor : 1.0) * (column < i_Lengths ? i_Factor : 1.0);
+	MatrixValidity::TakeOffRounding<t_Size>(io_Covariance);
 }
 
 /// The covariances of a target, all of which are given.
@@ -65,17 +69,25 @@ void ScaleTargetStatistics(
 	constexpr const char* c_Category = VSubjectKind<TSubject>::c_LogCategory;
 	const auto asLengths = [i_Factor](std::vector<double>& io_rCovariance)
 	{
-		for (double& rValue : io_rCovariance)
-			rValue *= i_Factor * i_Factor;
+		switch (const std::span<double> covariance(io_rCovariance); covariance.size())
+		{
+		case 4: return ScaleCovariance<2>(covariance.first<4>(), 2, i_Factor);
+		case 9: return ScaleCovariance<3>(covariance.first<9>(), 3, i_Factor);
+		case 36: return ScaleCovariance<6>(covariance.first<36>(), 6, i_Factor);
+		default:
+			for (double& rValue : covariance)
+				rValue *= i_Factor * i_Factor;
+		}
 	};
 	const auto asBody = [i_Factor, &i_rTarget](std::vector<double>& io_rCovariance)
 	{
 		const std::size_t markers = i_rTarget.m_MarkerIndices.size();
 		if (io_rCovariance.size() != 36 + 9 * markers)
 			return;
-		ScaleCovariance(io_rCovariance, 0, 6, 3, i_Factor);
+		const std::span<double> covariance(io_rCovariance);
+		ScaleCovariance<6>(covariance.first<36>(), 3, i_Factor);
 		for (std::size_t i = 0; i < markers; ++i)
-			ScaleCovariance(io_rCovariance, 36 + 9 * i, 3, 3, i_Factor);
+			ScaleCovariance<3>(covariance.subspan(36 + 9 * i).first<9>(), 3, i_Factor);
 	};
 	switch (i_rTarget.m_Type)
 	{

@@ -60,6 +60,8 @@ public:
 	VMathCursor(std::string_view i_Text, char i_Delimiter);
 
 	bool AtEnd() const { return m_pAt == m_pEnd; }
+	/// Behind the last token that was read.
+	std::size_t Position() const { return std::size_t(m_pAt - m_pBegin); }
 	/// True if the byte directly at the cursor is this one.
 	bool At(char i_Byte) const { return m_pAt != m_pEnd && *m_pAt == i_Byte; }
 
