@@ -1,8 +1,10 @@
 #include "retarget/Commands.h"
+#include "retarget/Messages.h"
 #include "retarget/Output.h"
 #include "retarget/SubjectFile.h"
 
 #include "CoreOrlexTypesUtils/SubjectCheck.h"
+#include "DebugServices/GlobalLog.h"
 
 namespace CommandLine
 {
@@ -12,10 +14,11 @@ namespace
 using CoreOrlexTypesUtils::VSubjectFinding;
 using VFindings = std::vector<VSubjectFinding>;
 
-struct VCheckSettings
+struct VChecked
 {
 	std::string m_File;
-	bool m_bJson = false;
+	bool m_bReadable = false;
+	VFindings m_Findings;
 };
 
 /// With the names of targets, which stand in the application data.
@@ -41,13 +44,24 @@ const char* KindOf(VSubjectFinding::EElement i_Element)
 	return "";
 }
 
-VJson ToJson(const VFindings& i_rFindings)
+VJson ToJson(const std::vector<VChecked>& i_rFiles)
 {
-	VJson list = VJson::array();
-	for (const VSubjectFinding& rFinding : i_rFindings)
-		list.push_back({{"kind", KindOf(rFinding.m_Element)}, {"index", rFinding.m_Index}, {"name", rFinding.m_Name},
-		    {"message", rFinding.m_Message}, {"remedy", rFinding.m_Remedy}, {"tolerated", rFinding.m_bTolerated}});
-	return list;
+	VJson files = VJson::array();
+	for (const VChecked& rFile : i_rFiles)
+	{
+		VJson list = VJson::array();
+		for (const VSubjectFinding& rFinding : rFile.m_Findings)
+			list.push_back({{"kind", KindOf(rFinding.m_Element)}, {"index", rFinding.m_Index},
+			    {"name", rFinding.m_Name}, {"message", rFinding.m_Message}, {"remedy", rFinding.m_Remedy},
+			    {"tolerated", rFinding.m_bTolerated}});
+		files.push_back({{"file", rFile.m_File}, {"readable", rFile.m_bReadable}, {"findings", std::move(list)}});
+	}
+	return files;
+}
+
+std::string Count(std::size_t i_Count, const std::string& i_rWhat)
+{
+	return (i_Count == 0 ? "no" : std::to_string(i_Count)) + " " + i_rWhat + (i_Count == 1 ? "" : "s");
 }
 
 std::string ToText(const VFindings& i_rFindings)
@@ -61,32 +75,55 @@ std::string ToText(const VFindings& i_rFindings)
 		text += ": " + Printable(rFinding.m_Message) + (rFinding.m_bTolerated ? " (tolerated)" : "") + "\n    "
 		    + Printable(rFinding.m_Remedy) + "\n";
 	}
-	const std::size_t count = i_rFindings.size();
-	return text + (count == 0 ? "no findings" : std::to_string(count) + (count == 1 ? " finding" : " findings")) + "\n";
+	return text + Count(i_rFindings.size(), "finding") + "\n";
 }
 
-EExitStatus ShowFindings(const VCheckSettings& i_rSettings)
+VChecked Check(const std::string& i_rPath)
 {
+	VChecked checked{i_rPath, false, {}};
 	VSubjectFile file;
-	const bool bRead = TryReadSubjectFile(i_rSettings.m_File, file);
-	VFindings findings = FindingsOf(file.m_Record);
-	// Elements that the reader dropped leave gaps among the others that are no fault of the file's.
-	if (!bRead)
-		std::erase_if(findings,
-		    [](const VSubjectFinding& i_rFinding)
-		    { return i_rFinding.m_Element != VSubjectFinding::EStaticParameter; });
-	if (bRead || !findings.empty())
+	try
 	{
-		if (i_rSettings.m_bJson)
-			PrintJson(ToJson(findings));
-		else
-			Print(ToText(findings));
+		checked.m_bReadable = TryReadSubjectFile(i_rPath, file);
 	}
-	if (!bRead)
-		throw VCommandError(EBadInput,
-		    "\"" + i_rSettings.m_File + "\" could not be read as a skeleton file"
-		        + (findings.empty() ? "" : "; only its static parameters were checked"));
-	return findings.empty() ? EFine : EFindings;
+	catch (const VCommandError& rError)
+	{
+		NVX_LOG(c_pCategory, NVX::ELogError, "%1%", rError.what());
+		return checked;
+	}
+	checked.m_Findings = FindingsOf(file.m_Record);
+	if (checked.m_bReadable)
+		return checked;
+	// Elements that the reader dropped leave gaps among the others that are no fault of the file's.
+	std::erase_if(checked.m_Findings,
+	    [](const VSubjectFinding& i_rFinding) { return i_rFinding.m_Element != VSubjectFinding::EStaticParameter; });
+	NVX_LOG(c_pCategory, NVX::ELogError, "\"%1%\" could not be read as a skeleton file%2%", i_rPath,
+	    checked.m_Findings.empty() ? "" : "; only its static parameters were checked");
+	return checked;
+}
+
+EExitStatus ShowFindings(const std::vector<std::string>& i_rPaths)
+{
+	std::vector<VChecked> files;
+	std::string text;
+	std::size_t unreadable = 0;
+	std::size_t faulty = 0;
+	for (const std::string& rPath : i_rPaths)
+	{
+		const VChecked& rFile = files.emplace_back(Check(rPath));
+		unreadable += !rFile.m_bReadable;
+		faulty += !rFile.m_Findings.empty();
+		if (!rFile.m_bReadable && rFile.m_Findings.empty())
+			continue;
+		text += (i_rPaths.size() > 1 ? Printable(rPath) + ":\n" : "") + ToText(rFile.m_Findings);
+	}
+	if (i_rPaths.size() > 1)
+		text += Count(files.size(), "file") + ": " + std::to_string(faulty) + " with findings, "
+		    + std::to_string(unreadable) + " unreadable\n";
+	PrintResult(ToJson(files), text);
+	if (unreadable > 0)
+		return EBadInput;
+	return faulty > 0 ? EFindings : EFine;
 }
 
 } // namespace
@@ -98,12 +135,13 @@ VCommand AddCheckCommand(CLI::App& io_rProgram)
 	    "how to mend it, in the names that \"retarget dump\" shows. Exit status 1 if there is any; what a finding "
 	    "calls "
 	    "tolerated works all the same",
-	    {"check hero.qrr", "check hero.qrr --json | jq -r '.[] | .kind + \" \" + .name + \": \" + .message'"});
-	const auto pSettings = std::make_shared<VCheckSettings>();
-	pApp->add_option("FILE", pSettings->m_File, "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)")
+	    {"check hero.qrr", "check *.qrr *.qrs",
+	        "check hero.qrr --json | jq -r '.[].findings[] | .kind + \" \" + .name + \": \" + .message'"});
+	const auto pFiles = std::make_shared<std::vector<std::string>>();
+	pApp->add_option("FILE", *pFiles, "Skeleton files (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx), any number")
+	    ->option_text("FILE...")
 	    ->required();
-	pApp->add_flag("--json", pSettings->m_bJson, "As JSON");
-	return {pApp, [pSettings] { return ShowFindings(*pSettings); }};
+	return {pApp, [pFiles] { return ShowFindings(*pFiles); }};
 }
 
 } // namespace CommandLine

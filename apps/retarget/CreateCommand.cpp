@@ -5,8 +5,6 @@
 
 #include "DebugServices/GlobalLog.h"
 
-#include <algorithm>
-
 namespace CommandLine
 {
 namespace
@@ -20,12 +18,6 @@ struct VCreateSettings
 	VOutput m_Out;
 };
 
-bool MatchesFilePose(const VEdits& i_rEdits)
-{
-	return std::any_of(
-	    i_rEdits.begin(), i_rEdits.end(), [](const VEdit& i_rEdit) { return i_rEdit.m_pKind->m_bOfCreate; });
-}
-
 EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 {
 	CheckOutput(i_rSettings.m_Out, c_RetargetSubjectFile, {i_rSettings.m_Fbx, i_rSettings.m_Source});
@@ -35,10 +27,11 @@ EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 		session.LoadSource(i_rSettings.m_Source);
 	session.CreateTarget(i_rSettings.m_Fbx, i_rSettings.m_Root);
 	if (const auto worst = DifferenceFromFile(session))
-		TellDifferenceFromFile(session, *worst, MatchesFilePose(i_rEdits) ? NVX::ELogInformation : NVX::ELogWarning,
-		    "The bind pose as built", "; --match-file-pose mends it");
+		TellDifferenceFromFile(
+		    session, *worst, NVX::ELogWarning, "The bind pose as built", "; --match-file-pose mends it");
 	ApplyEdits(session, i_rEdits);
 	session.Save(i_rSettings.m_Out.m_Path);
+	session.Report(i_rSettings.m_Out.m_Path);
 	return EFine;
 }
 

@@ -39,7 +39,10 @@ void HandleQtMessage(QtMsgType i_Type, const QMessageLogContext& i_rContext, con
 	}
 	// The program ends before a list could show it.
 	const auto tell = [](const char* i_pCategory, const std::string& i_rMessage)
-	{ PrintMessage(NVX::GlobalLog::Category(i_pCategory), NVX::ELogError, i_rMessage); };
+	{
+		ReleaseMessages();
+		PrintMessage(NVX::GlobalLog::Category(i_pCategory), NVX::ELogError, i_rMessage);
+	};
 	if (i_rText.contains(QLatin1String("no Qt platform plugin could be initialized")))
 	{
 		tell(s_Without.m_pCategory, s_Without.m_pSentence);

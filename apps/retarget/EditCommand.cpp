@@ -24,6 +24,7 @@ EExitStatus Edit(const VEditSettings& i_rSettings, const VEdits& i_rEdits)
 		session.LoadSource(i_rSettings.m_Source);
 	ApplyEdits(session, i_rEdits);
 	session.Save(i_rSettings.m_Out.m_Path);
+	session.Report(i_rSettings.m_Out.m_Path);
 	return EFine;
 }
 

@@ -200,6 +200,21 @@ void Pose(VSession& io_rSession, const std::string& i_rValue)
 	io_rSession.Document().SetTargetSubjectParametrised(subject);
 }
 
+/// What was told of a pose that is now the file's.
+void ForgetPoseWarnings()
+{
+	ForgetMessages(
+	    [](const std::string& i_rCategory, const std::string& i_rText)
+	    {
+		    for (const auto& [pCategory, pBegin] :
+		        {std::pair{"RetargetSetup", "Root bone '"}, {"RetargetSetup", "Removing joints changed the bind pose"},
+		            {c_pCategory, "The bind pose as built differs"}, {c_pCategory, "--prune-joints after"}})
+			    if (i_rCategory == pCategory && i_rText.starts_with(pBegin))
+				    return true;
+		    return false;
+	    });
+}
+
 void MatchFilePose(VSession& io_rSession, const std::string&)
 {
 	const VCharacterFile& rFile = *io_rSession.File();
@@ -207,6 +222,7 @@ void MatchFilePose(VSession& io_rSession, const std::string&)
 	const RetargetSetup::VFileMatch match = RetargetSetup::MatchFilePose(subject, rFile.m_Bones, rFile.m_Axis);
 	io_rSession.Document().SetTargetSubjectParametrised(subject);
 	io_rSession.m_bMatched = true;
+	ForgetPoseWarnings();
 	if (!match.m_Lengths.empty())
 		NVX_LOG(c_pCategory, NVX::ELogInformation, "--match-file-pose: %1% segments got the file's lengths",
 		    match.m_Lengths.size());

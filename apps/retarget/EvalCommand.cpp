@@ -1,4 +1,5 @@
 #include "retarget/Commands.h"
+#include "retarget/Messages.h"
 #include "retarget/Output.h"
 
 #include "CoreOrlexTypesUtils/StaticExpressionParser.h"
@@ -83,10 +84,12 @@ EExitStatus ShowValue(const VEvalSettings& i_rSettings)
 	std::string diagnostic;
 	if (!Evaluate(i_rSettings, value, diagnostic))
 	{
+		if (JsonAsked())
+			throw VCommandError(EBadInput, diagnostic);
 		std::fprintf(stderr, "%s\n", diagnostic.c_str());
 		return EBadInput;
 	}
-	Print(ValueText(value) + "\n");
+	PrintResult({{"value", value}}, ValueText(value) + "\n");
 	return EFine;
 }
 

@@ -1,6 +1,7 @@
 #include "retarget/Output.h"
 
 #include "retarget/ExitStatus.h"
+#include "retarget/Messages.h"
 
 #include <cerrno>
 #include <cstdio>
@@ -65,6 +66,7 @@ void Append(std::string& io_rText, const VJson& i_rValue, std::size_t i_Indent)
 
 void Print(std::string_view i_Text)
 {
+	ReleaseMessages();
 	errno = 0;
 	if (std::fwrite(i_Text.data(), 1, i_Text.size(), stdout) != i_Text.size() || std::fflush(stdout) != 0)
 		throw VCommandError(EBadOutput, std::string("Error writing to standard output: ") + std::strerror(errno));
@@ -75,6 +77,14 @@ std::string JsonText(const VJson& i_rValue)
 	std::string text;
 	Append(text, i_rValue, 0);
 	return text;
+}
+
+void PrintResult(const VJson& i_rJson, std::string_view i_Text)
+{
+	if (JsonAsked())
+		PrintJson(i_rJson);
+	else if (!i_Text.empty())
+		Print(i_Text);
 }
 
 void PrintJson(const VJson& i_rValue)

@@ -17,6 +17,9 @@ void Print(std::string_view i_Text);
 /// character.
 void PrintJson(const VJson& i_rValue);
 
+/// The JSON with --json, without it the text.
+void PrintResult(const VJson& i_rJson, std::string_view i_Text);
+
 /// The value as PrintJson prints it: one line for a value that holds only scalars.
 std::string JsonText(const VJson& i_rValue);
 

@@ -1,6 +1,7 @@
 #include "retarget/OutputFile.h"
 
 #include "retarget/ExitStatus.h"
+#include "retarget/Messages.h"
 
 #include "RetargetSetupDocument/FilePath.h"
 #include "UtilsFileSystem/Paths.h"
@@ -98,6 +99,9 @@ void AddForceOption(CLI::App& io_rApp, VOutput& io_rOutput)
 void CheckOutput(const VOutput& i_rOutput, const VOutputKind& i_rKind, const std::vector<std::string>& i_rInputs)
 {
 	const std::string& rPath = i_rOutput.m_Path;
+	if (rPath == "-" && JsonAsked())
+		throw VCommandError(
+		    EWrongUsage, "--json reports on standard output, where -o - puts the file: give the file a name");
 	if (rPath == "-")
 		return;
 	boost::system::error_code error;

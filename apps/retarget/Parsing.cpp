@@ -14,15 +14,6 @@ std::string SeeHelp(const CLI::App& i_rApp)
 	return "see \"" + (pProgram ? pProgram->get_name() + " " : "") + i_rApp.get_name() + " --help\"";
 }
 
-/// The closest of a few fixed names, if it can be a slip of the hand.
-std::string Meant(const std::string& i_rWord, const std::vector<std::string>& i_rNames)
-{
-	const std::vector<std::string> closest = Closest(i_rWord, i_rNames, 1);
-	if (closest.empty() || EditDistance(i_rWord, closest.front()) > std::max<std::size_t>(1, i_rWord.size() / 3))
-		return "";
-	return "; did you mean \"" + closest.front() + "\"?";
-}
-
 /// The first word of the line that no option and no command takes, with what may have been meant. Empty if there is
 /// none.
 std::string DescribeUnexpected(const CLI::App& i_rApp)
@@ -81,10 +72,8 @@ void AddMessageOptions(CLI::App& io_rApp, const std::shared_ptr<VMessageSettings
 	        "--log",
 	        [i_rpSettings](const std::string& i_rText)
 	        {
-		        if (!ParseCategoryLevel(i_rText, *i_rpSettings))
-			        throw CLI::ValidationError("--log",
-			            "\"" + i_rText
-			                + "\" is not CATEGORY=LEVEL with a level of error, warning, information or detail");
+		        if (const std::string wrong = ParseCategoryLevel(i_rText, *i_rpSettings); !wrong.empty())
+			        throw CLI::ValidationError("--log", wrong);
 	        },
 	        "Level of one category of messages: error, warning, information or detail; also as -v CATEGORY=LEVEL")
 	    ->option_text("CATEGORY=LEVEL")
@@ -94,9 +83,8 @@ void AddMessageOptions(CLI::App& io_rApp, const std::shared_ptr<VMessageSettings
 
 void Parse(CLI::App& io_rProgram, std::vector<std::string> i_Arguments)
 {
-	VMessageSettings ignored;
 	for (std::size_t i = 0; i + 1 < i_Arguments.size() && i_Arguments[i] != "--"; ++i)
-		if (i_Arguments[i] == "-v" && ParseCategoryLevel(i_Arguments[i + 1], ignored))
+		if (i_Arguments[i] == "-v" && LooksLikeCategoryLevel(i_Arguments[i + 1]))
 			i_Arguments[i] = "--log";
 	std::reverse(i_Arguments.begin(), i_Arguments.end());
 	try

@@ -111,11 +111,13 @@ void Save(const QImage& i_rPicture, const std::string& i_rPath)
 	std::string error = "The picture could not be made";
 	const bool bMade = i_rPicture.save(&buffer, "PNG");
 	const std::string_view content(bytes.constData(), std::size_t(bytes.size()));
+	RequireNoWarnings();
 	if (bMade && i_rPath == "-")
 		Print(content);
 	else if (!bMade
 	    || UtilsFileSystem::SaveFile(UtilsFileSystem::PathFromUtf8(i_rPath), content, error) != NVX::Status::c_Success)
 		throw VCommandError(EBadOutput, error);
+	PrintResult({{"output", i_rPath}, {"width", i_rPicture.width()}, {"height", i_rPicture.height()}}, "");
 }
 
 } // namespace

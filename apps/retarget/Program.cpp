@@ -55,10 +55,28 @@ EExitStatus RunParsed(const VProgram& i_rProgram)
 	return EWrongUsage;
 }
 
-int Fail(EExitStatus i_Status, const char* i_pMessage)
+int Fail(EExitStatus i_Status, const std::string& i_rMessage)
 {
-	NVX_LOG(c_pCategory, NVX::ELogError, "%1%", i_pMessage);
+	TellFailure(i_Status, i_rMessage);
 	return i_Status;
+}
+
+/// What scripts ask of every command.
+void AddScriptOptions(CLI::App& io_rApp, const std::shared_ptr<VMessageSettings>& i_rpSettings)
+{
+	io_rApp
+	    .add_flag_callback(
+	        "--json", [i_rpSettings] { i_rpSettings->m_bJson = true; },
+	        "The result as JSON on standard output, or a report of it where a file is written; messages as JSON on "
+	        "standard error, one object a line")
+	    ->trigger_on_parse()
+	    ->group("Messages");
+	io_rApp
+	    .add_flag_callback(
+	        "--strict", [i_rpSettings] { i_rpSettings->m_bStrict = true; },
+	        "A warning is an error: exit status 1, and nothing is written")
+	    ->trigger_on_parse()
+	    ->group("Messages");
 }
 
 } // namespace
@@ -94,9 +112,14 @@ VProgram MakeProgram(const VRender& i_rRender)
 	         VAdd(AddCheckCommand), VAdd(addRender), VAdd(AddFbxCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand),
 	         VAdd(AddConvertCommand), VAdd(AddSchemaCommand), VAdd(AddEvalCommand), VAdd(AddDocumentationCommand)})
 		program.m_Commands.push_back(rAdd(rApp));
-	AddMessageOptions(rApp, program.m_pMessages);
+	std::vector<CLI::App*> apps{&rApp};
 	for (const VCommand& rCommand : program.m_Commands)
-		AddMessageOptions(*rCommand.m_pApp, program.m_pMessages);
+		apps.push_back(rCommand.m_pApp);
+	for (CLI::App* const pApp : apps)
+	{
+		AddMessageOptions(*pApp, program.m_pMessages);
+		AddScriptOptions(*pApp, program.m_pMessages);
+	}
 	return program;
 }
 
@@ -123,7 +146,10 @@ int Run(std::vector<std::string> i_Arguments, const VRender& i_rRender)
 		}
 		pMessages.reset();
 		pMessages = ShowMessages(*program.m_pMessages);
-		return RunParsed(program);
+		HoldMessages();
+		const EExitStatus status = RunParsed(program);
+		RequireNoWarnings();
+		return status;
 	}
 	catch (const VCommandError& rError)
 	{

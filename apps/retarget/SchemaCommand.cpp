@@ -17,6 +17,8 @@ EExitStatus ShowSchema(const VOutput& i_rOut)
 		Print(reader.SchemaText());
 	else if (!reader.WriteSchema(i_rOut.m_Path))
 		throw VCommandError(EBadOutput, "\"" + i_rOut.m_Path + "\" could not be written");
+	else
+		PrintResult({{"output", i_rOut.m_Path}}, "");
 	return EFine;
 }
 

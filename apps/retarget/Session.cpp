@@ -2,6 +2,7 @@
 
 #include "retarget/ExitStatus.h"
 #include "retarget/Messages.h"
+#include "retarget/Output.h"
 #include "retarget/SubjectFile.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
@@ -13,6 +14,8 @@
 #include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/FilePose.h"
 #include "RetargetSetupDocument/TargetConstruction.h"
+
+#include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
 #include <numbers>
@@ -98,8 +101,29 @@ void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std:
 	m_File = {RetargetSetup::ExtractSubtree(*pSkeleton, root), m_pDocument->GetTargetAxisMatrix()};
 }
 
+void VSession::Report(const std::string& i_rPath) const
+{
+	const CoreOrlexTypes::VSubjectParametrised& rSubject = Target();
+	const auto joints = std::ranges::count_if(rSubject.m_Segments,
+	    [](const auto& i_rSegment)
+	    { return i_rSegment.m_Joint.m_JointType != CoreOrlexTypes::VSubjectParametrised::VJoint::EDummy; });
+	PrintResult({{"output", i_rPath}, {"segments", rSubject.m_Segments.size()}, {"joints", joints},
+	                {"targets", rSubject.m_Targets.size()}},
+	    "");
+}
+
 void VSession::Save(const std::string& i_rPath)
 {
+	if (StrictAsked() && i_rPath != "-")
+	{
+		// What saving would warn of is known only from a save.
+		boost::system::error_code error;
+		const boost::filesystem::path trial = boost::filesystem::temp_directory_path(error)
+		    / boost::filesystem::unique_path("retarget-%%%%%%%%%%%%.qrr", error);
+		m_pDocument->SaveTargetSubject(trial);
+		boost::filesystem::remove(trial, error);
+	}
+	RequireNoWarnings();
 	if (i_rPath == "-")
 	{
 		const auto values = m_pDocument->TargetValues();

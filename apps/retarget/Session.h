@@ -44,10 +44,14 @@ public:
 	void CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot);
 
 	/// EBadOutput if the file could not be written; the one that stood there then stays. "-" is standard output.
+	/// EFindings with --strict, and nothing written, if there has been a warning or saving would bring one.
 	void Save(const std::string& i_rPath);
 
 	/// What the document asks its host for.
 	TesselPluginInterface::VHostRules& Rules() { return m_pApplication->m_Rules; }
+	/// With --json: where the subject was saved and what it holds.
+	void Report(const std::string& i_rPath) const;
+
 	VRetargetSetup& Document() { return *m_pDocument; }
 	const std::shared_ptr<VRetargetSetup>& SharedDocument() const { return m_pDocument; }
 	const std::shared_ptr<InMemoryHost::VDispatcher>& Dispatcher() const { return m_pDispatcher; }

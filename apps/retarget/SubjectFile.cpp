@@ -11,6 +11,8 @@
 #include "NVX/Status.h"
 #include "RetargetSetupDocument/FilePath.h"
 #include "RetargetSetupDocument/Identity.h"
+#include "UtilsFileSystem/Paths.h"
+#include "UtilsFileSystem/SaveFile.h"
 
 #include <vector>
 
@@ -45,25 +47,23 @@ void WriteSubjectFile(const std::string& i_rPath, const CoreOrlexTypes::VSubject
     const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData,
     const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras, std::uint32_t i_VersionValue)
 {
-	CoreOrlexQRTIO::VWriter writer;
-	if (i_rPath != "-")
-	{
-		if (writer.Write(i_rPath, i_rSubject, i_rApplicationData, i_rExtras, i_VersionValue) != NVX::Status::c_Success)
-			throw VCommandError(EBadOutput, "\"" + i_rPath + "\" could not be written");
-		return;
-	}
 	std::string text;
 	std::vector<std::string> errors;
 	std::vector<std::string> warnings;
-	const bool bWritten =
-	    writer.WriteText(i_rSubject, i_rApplicationData, i_rExtras, i_VersionValue, text, errors, warnings);
+	const bool bWritten = CoreOrlexQRTIO::VWriter().WriteText(
+	    i_rSubject, i_rApplicationData, i_rExtras, i_VersionValue, text, errors, warnings);
 	for (const std::string& rWarning : warnings)
 		NVX_LOG("QRTIO", NVX::ELogWarning, "%1%", rWarning);
 	for (const std::string& rError : errors)
 		NVX_LOG("QRTIO", NVX::ELogError, "%1%", rError);
 	if (!bWritten)
-		throw VCommandError(EBadOutput, "the subject could not be written");
-	Print(text);
+		throw VCommandError(EBadOutput, "The subject could not be written");
+	RequireNoWarnings();
+	if (i_rPath == "-")
+		return Print(text);
+	std::string reason;
+	if (UtilsFileSystem::SaveFile(UtilsFileSystem::PathFromUtf8(i_rPath), text, reason) != NVX::Status::c_Success)
+		throw VCommandError(EBadOutput, reason);
 }
 
 } // namespace CommandLine

@@ -27,7 +27,7 @@ bool TryReadSubjectFile(const std::string& i_rPath, VSubjectFile& o_rFile);
 VSubjectFile ReadSubjectFile(const std::string& i_rPath);
 
 /// Writes a skeleton file at a version of the format, to standard output if the path is "-". Throws VCommandError with
-/// EBadOutput if that fails; a file that stood there then stays.
+/// EBadOutput if that fails, and with EFindings where --strict forbids it; a file that stood there then stays.
 void WriteSubjectFile(const std::string& i_rPath, const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
     const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData,
     const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras, std::uint32_t i_VersionValue);

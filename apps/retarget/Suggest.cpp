@@ -77,4 +77,12 @@ std::string DidYouMean(std::string_view i_Text, const std::vector<std::string>& 
 	return text + "?";
 }
 
+std::string Meant(const std::string& i_rText, const std::vector<std::string>& i_rNames)
+{
+	const std::vector<std::string> closest = Closest(i_rText, i_rNames, 1);
+	if (closest.empty() || EditDistance(i_rText, closest.front()) > std::max<std::size_t>(1, i_rText.size() / 3))
+		return "";
+	return "; did you mean \"" + closest.front() + "\"?";
+}
+
 } // namespace CommandLine

@@ -19,4 +19,7 @@ std::vector<std::string> Closest(
 /// `; did you mean "A", "B" or "C"?`, or nothing if there are no names.
 std::string DidYouMean(std::string_view i_Text, const std::vector<std::string>& i_rNames);
 
+/// `; did you mean "A"?` for the closest name, if the text can be a slip of the hand for it.
+std::string Meant(const std::string& i_rText, const std::vector<std::string>& i_rNames);
+
 } // namespace CommandLine

@@ -21,7 +21,6 @@ struct VTargetsSettings
 {
 	std::string m_File;
 	std::string m_Source;
-	bool m_bJson = false;
 };
 
 /// What is shown of one target; empty texts for what it does not have.
@@ -161,10 +160,7 @@ EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)
 		session.LoadSource(i_rSettings.m_Source);
 	const std::vector<VTargetLine> lines = Lines(session, bResiduals);
 	TellDisagreement(lines);
-	if (i_rSettings.m_bJson)
-		PrintJson(LinesToJson(lines, bResiduals));
-	else
-		Print(LinesToTable(lines, bResiduals));
+	PrintResult(LinesToJson(lines, bResiduals), LinesToTable(lines, bResiduals));
 	return EFine;
 }
 
@@ -181,8 +177,6 @@ VCommand AddTargetsCommand(CLI::App& io_rProgram)
 	pApp->add_option("FILE.qrr", pSettings->m_File, "The retarget subject, or a legacy one (.qrx)")->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton, for the residuals")
 	    ->option_text("FILE.qrs");
-	pApp->add_flag("--json", pSettings->m_bJson,
-	    "As JSON, distances in mm and angles in degrees; targetResidual is what a solver sees");
 	return {pApp, [pSettings] { return ShowTargets(*pSettings); }};
 }
 

@@ -18,7 +18,8 @@ TEST(Check, SoundFilesHaveNoFindings)
 		EXPECT_EQ(run.m_Status, 0) << rFile;
 		EXPECT_EQ(run.m_Out, "no findings\n") << rFile;
 		EXPECT_EQ(run.m_Err.empty(), rFile != "hero.qrr") << run.m_Err;
-		EXPECT_EQ(folder.Run({"check", rFile, "--json"}).m_Out, "[]\n") << rFile;
+		EXPECT_EQ(RunJson({"check", rFile, "--json"}, folder),
+		    VJson::parse(R"([{"file": ")" + rFile + R"(", "readable": true, "findings": []}])"));
 	}
 }
 
@@ -67,9 +68,15 @@ TEST(Check, DamagedFiles)
 	    },
 	    folder);
 
+	const VRun many = folder.Run({"check", "static.qrs", "normal.qrs", c_Performer, "nothing.qrs"});
+	EXPECT_EQ(many.m_Status, 3);
+	EXPECT_NE(
+	    many.m_Out.find(c_Performer + ":\nno findings\n4 files: 2 with findings, 2 unreadable\n"), std::string::npos)
+	    << many.m_Out;
+
 	const VRun run = folder.Run({"check", "--json", "normal.qrs"});
 	EXPECT_EQ(run.m_Status, 1);
-	const VJson list = VJson::parse(run.m_Out);
+	const VJson list = VJson::parse(run.m_Out)[0].at("findings");
 	ASSERT_EQ(list.size(), 2u);
 	EXPECT_EQ(list[0],
 	    VJson({{"kind", "target"}, {"index", 0}, {"name", "point"}, {"message", "Invalid target view normals"},

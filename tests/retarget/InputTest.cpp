@@ -81,12 +81,12 @@ TEST_F(Input, OfFbxFiles)
 
 TEST_F(Input, OutputThatCannotBeWritten)
 {
-	create_directory(m_Folder / "folder.qrs");
+	create_directory(m_Folder / "folder.xsd");
 	RunRows(
 	    {
 	        {"no folder", {"create", "--fbx", c_Fbx, "-o", "no/x.qrr"}, 4, "",
 	            "error QRTIO: Error opening file 'no/x.qrr' for writing"},
-	        {"a folder", {"convert", c_Performer, "folder.qrs"}, 4, "", "\"folder.qrs\" could not be written"},
+	        {"a folder", {"schema", "-o", "folder.xsd"}, 4, "", "\"folder.xsd\" could not be written"},
 	        {"schema", {"schema", "-o", "no/x.xsd"}, 4, "", "error retarget: \"no/x.xsd\" could not be written"},
 	    },
 	    m_Folder);

@@ -38,6 +38,11 @@ TEST(Usage, WrongWords)
 	    {"missing output", {"create", "--fbx", c_Fbx}, 2, "", "--output is required"},
 	    {"missing value", {"create", "--fbx"}, 2, "", "--fbx"},
 	    {"level", {"--log", "FBXIO=loud", "schema"}, 2, "", "\"FBXIO=loud\" is not CATEGORY=LEVEL"},
+	    {"level behind -v", {"-v", "QRTIO=none", "schema"}, 2, "", "--log: \"QRTIO=none\" is not CATEGORY=LEVEL"},
+	    {"category", {"schema", "--log", "QRTI=error"}, 2, "",
+	        "there is no category \"QRTI\"; did you mean \"QRTIO\"?; the categories are Command, CoreGraphics, "},
+	    {"report and file", {"schema", "--json"}, 2, "",
+	        R"({"level":"error","category":"retarget","text":"--json reports on standard output, where -o - puts the )"},
 	    {"context", {"eval", "1", "--context", "cubic"}, 2, "", "cubic not in {static,linear,full}"},
 	    {"pose", {"fk", c_Performer, "--pose", "rest"}, 2, "", "rest not in {bind,mean,tpose}"},
 	    {"version", {"convert", c_Performer, "x.qrs", "--format-version", "3.6"}, 2, "",
@@ -163,6 +168,40 @@ TEST(Usage, LevelsOfMessages)
 	EXPECT_NE(messages({"-v"}).find("information FBXIO: Loading file"), std::string::npos);
 	EXPECT_EQ(messages({"-v", "RetargetSetup=error"}), "");
 	EXPECT_EQ(messages({"--log=RetargetSetup=error", "-v"}).rfind("information FBXIO", 0), 0u);
+}
+
+TEST(Usage, WarningsAreErrorsWhereAsked)
+{
+	const VScratchFolder folder;
+	const std::vector<std::string> create{
+	    "create", "--fbx", Data("fbx/pab_arnaud_b7500.fbx"), "-o", "x.qrr", "--strict"};
+	const auto with = [&](std::vector<std::string> i_Options)
+	{
+		i_Options.insert(i_Options.begin(), create.begin(), create.end());
+		return i_Options;
+	};
+	RunRows(
+	    {
+	        {"a warning", with({}), 1, "", "error retarget: --strict: 2 warnings count as errors\n"},
+	        {"a quiet one", with({"-q"}), 1, "", "error retarget: --strict: 2 warnings count as errors\n"},
+	        {"as JSON", with({"-q", "--json"}), 1, "",
+	            R"({"level":"error","category":"retarget","text":"--strict: 2 warnings count as errors","status":1})"},
+	    },
+	    folder);
+	EXPECT_EQ(RunJson(with({"--match-file-pose", "--json"}), folder),
+	    VJson({{"output", "x.qrr"}, {"segments", 54}, {"joints", 54}, {"targets", 0}}));
+}
+
+TEST(Usage, ReasonsOfErrors)
+{
+	const VScratchFolder folder;
+	folder.Write("cut.qrs", "<KinematicModel");
+	const std::string read = "error QRTIO: Failed to read file\n"
+	                         "error retarget: \"cut.qrs\" could not be read as a skeleton file\n";
+	const std::string reason = "warning QRTIO: line 1: tag of element KinematicModel does not end\n";
+	EXPECT_EQ(folder.Run({"dump", "cut.qrs"}).m_Err, reason + read);
+	EXPECT_EQ(folder.Run({"dump", "cut.qrs", "-q"}).m_Err, reason + read);
+	EXPECT_EQ(folder.Run({"dump", "cut.qrs", "--log", "QRTIO=error"}).m_Err, read) << "as asked";
 }
 
 TEST(Usage, CompletionKnowsTheOptionTable)

@@ -1,6 +1,8 @@
+#include "../UtilsFileSystem/Folder.h"
 #include "retarget/Elements.h"
 #include "retarget/ExitStatus.h"
 #include "retarget/HelpFormatter.h"
+#include "retarget/Messages.h"
 #include "retarget/Output.h"
 #include "retarget/Suggest.h"
 
@@ -8,7 +10,11 @@
 
 #include <gtest/gtest.h>
 
+#include <boost/filesystem/operations.hpp>
+
 #include <limits>
+#include <regex>
+#include <set>
 
 using namespace CommandLine;
 
@@ -45,6 +51,23 @@ TEST(Suggest, NamesTheClosestFirst)
 	EXPECT_EQ(Closest("Character1:Hips", names, 1), (std::vector<std::string>{"Hips"}));
 	EXPECT_EQ(DidYouMean("hed", {"Head", "Hips"}), "; did you mean \"Head\" or \"Hips\"?");
 	EXPECT_EQ(DidYouMean("hed", {}), "");
+}
+
+/// A category that is not listed could not be given a level.
+TEST(Messages, AllCategoriesAreKnown)
+{
+	const std::regex category(R"x((?:NVX_LOG\(\s*|c_p?(?:Log)?Category = |GlobalLog::Category\()"([^"/]+)")x");
+	std::set<std::string> found;
+	for (const char* pFolder : {"/src", "/apps"})
+		for (const auto& rEntry :
+		    boost::filesystem::recursive_directory_iterator(RETARGET_SOURCE + std::string(pFolder)))
+			if (rEntry.path().extension() == ".cpp" || rEntry.path().extension() == ".h")
+			{
+				const std::string text = Get(rEntry.path());
+				for (std::sregex_iterator it(text.begin(), text.end(), category); it != std::sregex_iterator(); ++it)
+					found.insert((*it)[1]);
+			}
+	EXPECT_EQ(found, std::set<std::string>(std::begin(c_Categories), std::end(c_Categories)));
 }
 
 TEST(Side, StandsInAWordOfItsOwn)
