@@ -62,7 +62,7 @@ VJson PartToJson(const FBXIO::VMeshPart& i_rPart)
 	part["shininess"] = i_rPart.m_Shininess;
 	part["transparent"] = VectorToJson(i_rPart.m_Transparent);
 	part["reflection"] = VectorToJson(i_rPart.m_Reflection);
-	part["texture"] = i_rPart.m_pTexture ? VJson(i_rPart.m_TexturePath) : VJson();
+	part["texture"] = i_rPart.m_TextureSize.isEmpty() ? VJson() : VJson(i_rPart.m_TexturePath);
 	return part;
 }
 
@@ -137,7 +137,9 @@ VJson SkinToJson(FBXIO::FBXReader& io_rReader)
 EExitStatus ShowFbx(const VFbxSettings& i_rSettings)
 {
 	FBXIO::FBXReader reader;
-	reader.SetMeshRules(FBXIO::c_FaithfulMeshes);
+	FBXIO::VMeshRules rules = FBXIO::c_FaithfulMeshes;
+	rules.m_Pictures = FBXIO::EPictures::Heads;
+	reader.SetMeshRules(rules);
 	if (!reader.LoadFile(i_rSettings.m_File))
 		throw VCommandError(EBadInput, "\"" + i_rSettings.m_File + "\" could not be read as FBX");
 	VJson result = VJson::object();

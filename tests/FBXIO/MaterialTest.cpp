@@ -40,6 +40,7 @@ protected:
 		        {{0, {0, 0, 0, 1, 0, 0, 0, 1, 0}, {0, 1, -3, 0, 2, -2}, {}, {}, i_rLayer, i_rMaterials, {},
 		            i_rTextures}}));
 		FBXReader reader;
+		reader.SetMeshRules({EVertexKey::UVIndex, m_Pictures});
 		EXPECT_TRUE(reader.LoadFile(Path("hero.fbx")));
 		VBasicMesh mesh;
 		reader.ReadTopMesh(mesh);
@@ -47,6 +48,7 @@ protected:
 	}
 
 	const VTestFolder m_Folder;
+	EPictures m_Pictures = EPictures::All;
 	VTestLog m_Failed{"Import"};
 };
 
@@ -131,6 +133,42 @@ TEST_P(Material, PicturesInTheFileComeFirst)
 	ASSERT_NE(broken.at(0).m_pTexture, nullptr);
 	EXPECT_EQ(broken[0].m_pTexture->width(), 3);
 	EXPECT_EQ(m_Failed.Take(), std::vector<std::string>{"2 Failed to load skin.png (embedded)"});
+}
+
+TEST_P(Material, NothingIsPrintedOfDamagedPictures)
+{
+	WritePicture("skin.png", 3);
+	const std::string png = Get(Path("skin.png"));
+	testing::internal::CaptureStderr();
+	for (std::size_t at = 0; at < png.size(); ++at)
+	{
+		std::string damaged = png;
+		damaged[at] = char(damaged[at] ^ 0x55);
+		for (const std::string& rContent : {damaged, png.substr(0, at)})
+		{
+			Put(Path("skin.png"), rContent);
+			const bool bRead = Read({{"lambert", {}, Path("skin.png"), ""}}).at(0).m_pTexture != nullptr;
+			EXPECT_EQ(m_Failed.Take().empty(), bRead) << at;
+		}
+	}
+	EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
+}
+
+TEST_P(Material, OfPicturesTheHeadsMayBeEnough)
+{
+	WritePicture("skin.png", 3);
+	Put(Path("cut.png"), Get(Path("skin.png")).substr(0, 66));
+	Put(Path("none.png"), "no picture");
+	for (const auto& [what, bRead] : {std::pair(EPictures::All, false), {EPictures::Heads, true}})
+	{
+		m_Pictures = what;
+		const VMeshPart whole = Read({{"lambert", {}, Path("skin.png"), ""}}).at(0);
+		EXPECT_EQ(whole.m_TextureSize, QSize(3, 1));
+		EXPECT_EQ(whole.m_pTexture == nullptr, bRead);
+		EXPECT_EQ(!Read({{"lambert", {}, Path("cut.png"), ""}}).at(0).m_TextureSize.isEmpty(), bRead);
+		EXPECT_TRUE(Read({{"lambert", {}, Path("none.png"), ""}}).at(0).m_TextureSize.isEmpty());
+		EXPECT_EQ(m_Failed.Take().size(), bRead ? 1u : 2u);
+	}
 }
 
 /// A head that promises more than a picture may have.

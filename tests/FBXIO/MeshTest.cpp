@@ -223,6 +223,23 @@ TEST_P(Mesh, DamageIsToldAndLeftOut)
 	        "zero"}));
 }
 
+TEST(MeshMessages, NameTheNodeOfANamelessGeometry)
+{
+	const VTestForm& rText = c_Forms[4];
+	std::string file = Write(rText, {{{"body", "Mesh", -1, {}}}, {}, {}, {}},
+	    {VTestMesh{0, c_Square, {0, 9, -3}, {}, {}, c_OneMaterial, {}, {}}});
+	const std::string name = "bodyShape";
+	file.erase(file.find(name), name.size());
+	VTestLog log("FBXIO");
+	FBXReader reader;
+	EXPECT_TRUE(reader.LoadMemory(file, "PATH"));
+	VBasicMesh mesh;
+	reader.ReadTopMesh(mesh);
+	EXPECT_EQ(Told(log),
+	    VMessages{
+	        "3 Polygons left out of mesh body because they have no end or name control points that do not exist: 1"});
+}
+
 /// A strip of triangles over this many control points, of which the last is the last corner.
 VTestMesh Strip(std::size_t i_Points)
 {

@@ -170,12 +170,15 @@ void FBXIO::FBXMeshReader::ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPa
 		return;
 	const FbxFileTexture& rTexture = *pLambert->Diffuse.GetSrcObject<FbxFileTexture>(0);
 	io_rPart.m_TexturePath = rTexture.GetFileName();
-	io_rPart.m_pTexture =
+	VCachedPicture picture =
 	    m_Images.Get(io_rPart.m_TexturePath + " (embedded)", [&rTexture] { return ContentOf(rTexture); });
-	if (io_rPart.m_pTexture)
-		return;
-	io_rPart.m_TexturePath = FindTexture(rTexture);
-	io_rPart.m_pTexture = m_Images.Get(io_rPart.m_TexturePath);
+	if (picture.m_Size.isEmpty())
+	{
+		io_rPart.m_TexturePath = FindTexture(rTexture);
+		picture = m_Images.Get(io_rPart.m_TexturePath);
+	}
+	io_rPart.m_pTexture = std::move(picture.m_pImage);
+	io_rPart.m_TextureSize = picture.m_Size;
 }
 
 std::string FBXIO::FBXMeshReader::FindTexture(const FbxFileTexture& i_rTexture) const

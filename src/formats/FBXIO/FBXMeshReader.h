@@ -28,7 +28,11 @@ public:
 	/// The skeleton whose bones clusters are found in; the last bone of each name.
 	void SetSkeleton(std::shared_ptr<VSkinSkeleton> i_pSkeleton);
 
-	void SetRules(const VMeshRules& i_rRules) { m_Rules = i_rRules; }
+	void SetRules(const VMeshRules& i_rRules)
+	{
+		m_Rules = i_rRules;
+		m_Images.SetPictures(i_rRules.m_Pictures);
+	}
 
 	static bool IsMesh(FbxNode& i_rNode);
 

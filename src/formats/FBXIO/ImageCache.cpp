@@ -7,12 +7,13 @@
 
 #include <algorithm>
 
-std::shared_ptr<const QImage> FBXIO::ImageCache::Read(
-    const QByteArray& i_rBytes, const QByteArray& i_rFormat, const std::string& i_rName, std::uint64_t& io_rBytesLeft)
+FBXIO::VCachedPicture FBXIO::ImageCache::Read(const QByteArray& i_rBytes, const QByteArray& i_rFormat,
+    const std::string& i_rName, std::uint64_t& io_rBytesLeft) const
 {
-	VPicture picture = ReadPicture(i_rBytes, i_rFormat, io_rBytesLeft);
-	if (!picture.m_Image.isNull())
-		return std::make_shared<const QImage>(std::move(picture.m_Image));
+	VPicture picture = ReadPicture(i_rBytes, i_rFormat, m_What, io_rBytesLeft);
+	if (picture.m_bSound)
+		return {picture.m_Image.isNull() ? nullptr : std::make_shared<const QImage>(std::move(picture.m_Image)),
+		    picture.m_Size};
 	if (picture.m_bTooLarge)
 		NVX_LOG("Import", NVX::ELogError,
 		    "Failed to load %1%: its %2% by %3% points, or all pictures of the FBX file together, are too large",
@@ -22,7 +23,7 @@ std::shared_ptr<const QImage> FBXIO::ImageCache::Read(
 	return {};
 }
 
-std::shared_ptr<const QImage> FBXIO::ImageCache::Get(const std::string& i_rPath)
+FBXIO::VCachedPicture FBXIO::ImageCache::Get(const std::string& i_rPath)
 {
 	const auto [entry, bNew] = m_Images.try_emplace(i_rPath);
 	if (!bNew)
@@ -38,8 +39,7 @@ std::shared_ptr<const QImage> FBXIO::ImageCache::Get(const std::string& i_rPath)
 	return entry->second = Read(bytes, info.suffix().toLower().toLatin1(), i_rPath, m_BytesLeft);
 }
 
-std::shared_ptr<const QImage> FBXIO::ImageCache::Get(
-    const std::string& i_rName, const std::function<std::string()>& i_rRead)
+FBXIO::VCachedPicture FBXIO::ImageCache::Get(const std::string& i_rName, const std::function<std::string()>& i_rRead)
 {
 	const auto [entry, bNew] = m_Images.try_emplace(i_rName);
 	if (!bNew)

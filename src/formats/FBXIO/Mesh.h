@@ -42,8 +42,10 @@ struct VMeshPart
 	float m_Shininess = 0.0f;
 	QVector4D m_Transparent;
 	QVector4D m_Reflection;
-	/// Empty if there is none, or none that could be read.
+	/// Empty if there is none, or none that could be read, and if only the heads of pictures are.
 	std::shared_ptr<const QImage> m_pTexture;
+	/// In points; empty if there is none, or none that could be read.
+	QSize m_TextureSize;
 	/// The file that the texture was looked for in; empty if the material names none.
 	std::string m_TexturePath;
 	/// Bytes of one index, 2 or 4.

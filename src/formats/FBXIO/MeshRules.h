@@ -13,10 +13,19 @@ enum class EVertexKey
 	ControlPointAndUVIndex
 };
 
+/// What is read of the pictures of textures.
+enum class EPictures
+{
+	All,
+	/// Their heads alone: that they are there, and how large they are.
+	Heads
+};
+
 /// How meshes are read where a rule has a plain form and one that fits more files. The defaults are the plain forms.
 struct VMeshRules
 {
 	EVertexKey m_VertexKey = EVertexKey::UVIndex;
+	EPictures m_Pictures = EPictures::All;
 };
 
 /// For programs that show a mesh as its file means it.

@@ -342,7 +342,12 @@ void FbxFormat::VSceneBuilder::ConnectParts(
 		if (FbxSkeleton* const pSkeleton = child(static_cast<FbxSkeleton*>(nullptr)); pSkeleton && !rData.m_pSkeleton)
 			rData.m_pSkeleton = pSkeleton;
 		else if (FbxMesh* const pMesh = child(c_pMesh); pMesh && !rData.m_pMesh)
+		{
 			rData.m_pMesh = pMesh;
+			// Messages about it must name something that can be found.
+			if (pMesh->m_Name.empty())
+				pMesh->m_Name = pNode->m_Name;
+		}
 		else if (FbxSurfaceMaterial* const pMaterial = child(c_pMaterial))
 			rData.m_Materials.push_back(pMaterial);
 		else if (FbxSkin* const pSkin = child(c_pSkin); pSkin && rData.m_pMesh)

@@ -2,6 +2,11 @@
 
 #include <string>
 
+namespace FbxFormat
+{
+class VSceneBuilder;
+}
+
 namespace fbxsdk
 {
 
@@ -19,6 +24,8 @@ protected:
 	explicit FbxObject(std::string i_Name) : m_Name(std::move(i_Name)) {}
 
 private:
+	friend class FbxFormat::VSceneBuilder;
+
 	std::string m_Name;
 };
 
