@@ -162,6 +162,8 @@ void SetScale(VSession& io_rSession, const std::string& i_rValue)
 	if (!(scale > 0.0))
 		throw VCommandError(EWrongUsage, "--scale: a scale must be above 0: " + i_rValue);
 	io_rSession.Document().SetTargetScale(scale);
+	if (io_rSession.Document().GetTargetScale() != scale)
+		throw VCommandError(EWrongUsage, "--scale: the target subject takes no other scale");
 }
 
 void CreateJoints(VSession& io_rSession, const std::string&)

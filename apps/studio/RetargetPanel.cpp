@@ -67,7 +67,9 @@ VRetargetPanel::VRetargetPanel(
     : m_pWidget(&i_rPanel), m_pDocument(&i_rDocument), m_pParameters(std::move(i_pParameters))
 {
 	connect(m_pDocument, SIGNAL(commandIgnored(QString, QString)), this, SLOT(TellIgnored(QString, QString)));
-	connect(m_pDocument, SIGNAL(targetSubjectLoaded(QUrl)), this, SLOT(TellLoaded(QUrl)));
+	connect(m_pDocument, SIGNAL(targetSubjectLoaded(QUrl)), this, SLOT(TellUsed(QUrl)));
+	connect(m_pDocument, SIGNAL(targetSubjectSaved(QUrl)), this, SLOT(TellUsed(QUrl)));
+	connect(m_pDocument, SIGNAL(unsavedChangesChanged()), this, SIGNAL(stateChanged()));
 	if (auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data()))
 		connect(pQuickWidget, &QQuickWidget::statusChanged, this, &VRetargetPanel::FollowRootItem);
 	FollowRootItem();
@@ -86,7 +88,7 @@ void VRetargetPanel::FollowRootItem()
 		return;
 	m_pRoot = pRoot;
 	if (pRoot->metaObject()->indexOfProperty(c_pCurrentFile) >= 0)
-		connect(pRoot, SIGNAL(currentTargetSubjectURLChanged()), this, SLOT(TellCurrentFile()));
+		connect(pRoot, SIGNAL(currentTargetSubjectURLChanged()), this, SIGNAL(stateChanged()));
 	emit ready();
 }
 
@@ -112,6 +114,7 @@ bool VRetargetPanel::Open(const QString& i_rPath)
 	case EFileKind::ESource: return SetParameter(c_pSource, path);
 	case EFileKind::EFbx: return SetParameter(c_pFbx, path);
 	default:
+		ApplyTyped();
 		return QMetaObject::invokeMethod(
 		    m_pDocument, "LoadTargetSubjectURL", Qt::DirectConnection, Q_ARG(QUrl, QUrl::fromLocalFile(path)));
 	}
@@ -175,10 +178,33 @@ void VRetargetPanel::Save()
 		return;
 	// Without a file the panel asks for one.
 	QObject* const pDialog = m_pRoot->findChild<QObject*>(QStringLiteral("saveDialog"));
-	if (m_pRoot->property(c_pCurrentFile).toUrl().isLocalFile())
+	if (!CurrentFile().isEmpty())
 		QMetaObject::invokeMethod(m_pRoot, "save");
 	else if (pDialog)
 		QMetaObject::invokeMethod(pDialog, "open");
+}
+
+void VRetargetPanel::SaveTo(const QString& i_rPath)
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(
+	    m_pDocument, "SaveTargetSubjectURL", Qt::DirectConnection, Q_ARG(QUrl, QUrl::fromLocalFile(i_rPath)));
+}
+
+void VRetargetPanel::ApplyTyped()
+{
+	if (m_pRoot)
+		QMetaObject::invokeMethod(m_pRoot, "commitEdits");
+}
+
+QString VRetargetPanel::CurrentFile() const
+{
+	return m_pRoot ? m_pRoot->property(c_pCurrentFile).toUrl().toLocalFile() : QString();
+}
+
+bool VRetargetPanel::IsCurrentFileReadOnly() const
+{
+	return CurrentFile().endsWith(QStringLiteral(".qrx"));
 }
 
 bool VRetargetPanel::HasUnsavedChanges() const
@@ -229,18 +255,13 @@ void VRetargetPanel::TellIgnored(const QString& i_rCommand, const QString& i_rRe
 	    std::ranges::find(c_Buttons, i_rCommand, [](const auto& i_rRow) { return QString(i_rRow.first); });
 	const QString name = found == std::end(c_Buttons) ? i_rCommand : found->second;
 	NVX_LOG("Command", NVX::ELogWarning, "%1%: %2%", name.toStdString(), i_rReason.toStdString());
+	if (i_rCommand == QStringLiteral("SaveTargetSubjectURL"))
+		emit saveFailed(i_rReason);
 }
 
-void VRetargetPanel::TellLoaded(const QUrl& i_rUrl)
+void VRetargetPanel::TellUsed(const QUrl& i_rUrl)
 {
 	emit fileUsed(i_rUrl.toLocalFile());
-}
-
-void VRetargetPanel::TellCurrentFile()
-{
-	const QUrl url = m_pRoot ? m_pRoot->property(c_pCurrentFile).toUrl() : QUrl();
-	if (url.isLocalFile())
-		emit fileUsed(url.toLocalFile());
 }
 
 } // namespace StudioHost

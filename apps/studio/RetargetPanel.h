@@ -44,12 +44,21 @@ public:
 
 	/// Saves the target subject to its file; the panel asks for one if there is none.
 	void Save();
+	void SaveTo(const QString& i_rPath);
 
-	/// The target subject would be lost.
+	/// What is being typed reaches the target subject.
+	void ApplyTyped();
+
+	/// The target subject would be lost. What is being typed does not count.
 	bool HasUnsavedChanges() const;
 
 	/// The segments and the target that a message names, for the selection.
 	std::vector<NVX::ISelectionItem> ItemsNamedIn(const QString& i_rMessage) const;
+
+	/// What "Save" writes; empty without a file.
+	QString CurrentFile() const;
+	/// The current file is one that is only read.
+	bool IsCurrentFileReadOnly() const;
 
 	QWidget* Widget() const { return m_pWidget; }
 
@@ -59,6 +68,12 @@ public:
 signals:
 	/// A file was opened, or the target subject saved to it.
 	void fileUsed(const QString& i_rPath);
+
+	/// Why a save ended with no file.
+	void saveFailed(const QString& i_rReason);
+
+	/// The current file is another one, or what is unsaved has changed.
+	void stateChanged();
 
 	void ready();
 
@@ -73,8 +88,7 @@ private:
 
 private slots:
 	void TellIgnored(const QString& i_rCommand, const QString& i_rReason);
-	void TellCurrentFile();
-	void TellLoaded(const QUrl& i_rUrl);
+	void TellUsed(const QUrl& i_rUrl);
 
 private:
 	const QPointer<QWidget> m_pWidget;

@@ -138,6 +138,26 @@ void VStudioWindow::AskAndOpen(int i_Kind)
 	}
 }
 
+QString VStudioWindow::AskWhereToSave()
+{
+	const char* const pKey = TesselPluginInterface::c_FolderKeys[TesselPluginInterface::EPathRetargets];
+	QString file = QString::fromStdString(UtilsFileSystem::ToUtf8(m_pContext->Preferences().Folder(pKey)));
+	for (;;)
+	{
+		file = QFileDialog::getSaveFileName(
+		    this, tr("Choose a file"), file, tr("Subject files (*.qrr)"), nullptr, QFileDialog::DontConfirmOverwrite);
+		// A file of another extension would be none that the dialogs show.
+		if (!file.isEmpty() && KindOf(file) != EFileKind::ETarget)
+			file += QStringLiteral(".qrr");
+		if (file.isEmpty() || !QFileInfo::exists(file)
+		    || QMessageBox::warning(this, tr("Save As"),
+		           tr("%1 is there already. Do you want to replace it?").arg(QFileInfo(file).fileName()),
+		           QMessageBox::Yes | QMessageBox::No, QMessageBox::No)
+		        == QMessageBox::Yes)
+			return file;
+	}
+}
+
 void VStudioWindow::UpdateRecentFiles()
 {
 	m_pRecentMenu->clear();

@@ -15,6 +15,7 @@
 
 #include <QCloseEvent>
 #include <QDockWidget>
+#include <QFileInfo>
 #include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
@@ -30,6 +31,7 @@ namespace
 constexpr int c_LayoutVersion = 1;
 /// In pixels; a few messages.
 constexpr int c_LogHeight = 180;
+const QString c_Title = QStringLiteral("Retarget Studio");
 const QString c_GeometryKey = QStringLiteral("Window/Geometry");
 const QString c_StateKey = QStringLiteral("Window/State");
 
@@ -43,7 +45,7 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
           *this, *m_pContext, i_bDeveloper, [this](const QString& i_rCommand) { return Execute(i_rCommand); }))
 {
 	Named(this, "StudioWindow", tr("Retarget Studio"));
-	setWindowTitle(tr("Retarget Studio"));
+	setWindowTitle(c_Title);
 	setAcceptDrops(true);
 	new VFileDrop(
 	    *this,
@@ -72,6 +74,9 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	m_pLogDock->setWidget(pLogPanel);
 	m_pLogDock->setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Maximum);
 	addDockWidget(Qt::BottomDockWidgetArea, m_pLogDock);
+
+	m_pContext->Application().m_AskToReplace = [this](const std::string& i_rAction)
+	{ return MayLoseChanges(QString::fromStdString(i_rAction)); };
 
 	MakeMenus(i_bDeveloper);
 	menuBar()->setCornerWidget(new VSkinProgress(m_pGui->GetSkinCache(), m_pDispatcher));
@@ -112,7 +117,12 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 		if (!m_pRetargetPanel)
 			m_pRetargetPanel = VRetargetPanel::Find(*pPanel, m_pContext->GetParameterRegistry());
 	if (m_pRetargetPanel)
+	{
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::fileUsed, m_pRecentFiles.get(), &VRecentFiles::Add);
+		connect(m_pRetargetPanel.get(), &VRetargetPanel::saveFailed, this, &VStudioWindow::ShowSaveFailure);
+		connect(m_pRetargetPanel.get(), &VRetargetPanel::stateChanged, this, &VStudioWindow::UpdateTitle);
+	}
+	UpdateTitle();
 	m_pNotice->setVisible(docks.isEmpty());
 	// Below a panel it keeps its height when the window grows; in an area of its own it would not.
 	if (!docks.isEmpty())
@@ -123,6 +133,7 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 void VStudioWindow::UnloadModule()
 {
 	m_pRetargetPanel.reset();
+	UpdateTitle();
 	m_pGui->PanelManager().Clear();
 	if (!m_pModule)
 		return;
@@ -165,30 +176,67 @@ void VStudioWindow::showEvent(QShowEvent* i_pEvent)
 
 void VStudioWindow::closeEvent(QCloseEvent* i_pEvent)
 {
-	if (!MayClose())
+	if (!MayLoseChanges(tr("Quit")))
 		return i_pEvent->ignore();
 	m_rSettings.setValue(c_GeometryKey, saveGeometry());
 	m_rSettings.setValue(c_StateKey, saveState(c_LayoutVersion));
 	QMainWindow::closeEvent(i_pEvent);
 }
 
-bool VStudioWindow::MayClose()
+bool VStudioWindow::MayLoseChanges(const QString& i_rAction)
 {
-	if (!m_pRetargetPanel || !m_pRetargetPanel->HasUnsavedChanges())
+	if (!m_pRetargetPanel)
 		return true;
-	QMessageBox box(QMessageBox::Warning, windowTitle(), tr("The retarget subject has changes that are not saved."),
+	m_pRetargetPanel->ApplyTyped();
+	if (!m_pRetargetPanel->HasUnsavedChanges())
+		return true;
+	const QString file = QFileInfo(m_pRetargetPanel->CurrentFile()).fileName();
+	QMessageBox box(QMessageBox::Warning, c_Title,
+	    (file.isEmpty() ? tr("The retarget subject has changes that are in no file.")
+	                    : tr("%1 has changes that are not saved.").arg(file)),
 	    QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, this);
+	box.setInformativeText(tr("\"%1\" would lose them.").arg(i_rAction));
 	Named(&box, "UnsavedChanges", box.text());
 	box.setDefaultButton(QMessageBox::Save);
 	switch (box.exec())
 	{
 	case QMessageBox::Discard: return true;
-	case QMessageBox::Save:
-		// Where it must ask for a file, or cannot write it, the window stays.
-		m_pRetargetPanel->Save();
-		return !m_pRetargetPanel->HasUnsavedChanges();
+	case QMessageBox::Save: return SaveChanges();
 	default: return false;
 	}
+}
+
+bool VStudioWindow::SaveChanges()
+{
+	QString file = m_pRetargetPanel->CurrentFile();
+	if (file.isEmpty() || m_pRetargetPanel->IsCurrentFileReadOnly())
+		file = AskWhereToSave();
+	if (file.isEmpty())
+		return false;
+	m_pRetargetPanel->SaveTo(file);
+	return !m_pRetargetPanel->HasUnsavedChanges();
+}
+
+void VStudioWindow::ShowSaveFailure(const QString& i_rReason)
+{
+	auto* const pBox = Named(new QMessageBox(QMessageBox::Critical, c_Title, tr("The retarget subject is not saved."),
+	                             QMessageBox::Ok, this),
+	    "SaveFailure", tr("The retarget subject is not saved."));
+	pBox->setInformativeText(i_rReason);
+	pBox->setAttribute(Qt::WA_DeleteOnClose);
+	pBox->open();
+}
+
+void VStudioWindow::UpdateTitle()
+{
+	const bool bUnsaved = m_pRetargetPanel && m_pRetargetPanel->HasUnsavedChanges();
+	QString file = m_pRetargetPanel ? QFileInfo(m_pRetargetPanel->CurrentFile()).fileName() : QString();
+	if (file.isEmpty() && bUnsaved)
+		file = tr("New retarget subject");
+	// Where the mark stands; in a name it is no mark.
+	file.replace(QStringLiteral("[*]"), QStringLiteral("[*][*]"));
+	setWindowTitle(file.isEmpty() ? c_Title : QStringLiteral("%1[*] - %2").arg(file, c_Title));
+	setWindowModified(bUnsaved);
 }
 
 void VStudioWindow::SelectNamedIn(const QString& i_rMessage)

@@ -63,6 +63,8 @@ private:
 	QAction* AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText, const QKeySequence& i_rShortcut,
 	    std::function<void()> i_Run);
 	void AskAndOpen(int i_Kind);
+	/// @return empty if no file was chosen.
+	QString AskWhereToSave();
 	void UpdateRecentFiles();
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
@@ -71,8 +73,13 @@ private:
 	void SelectNamedIn(const QString& i_rMessage);
 	void Say(const QString& i_rText);
 	/// Asks what is to become of changes that are not saved.
-	/// @return false if the window must stay.
-	bool MayClose();
+	/// @param i_rAction what would lose them.
+	/// @return false if they stay.
+	bool MayLoseChanges(const QString& i_rAction);
+	/// @return false if they are in no file then.
+	bool SaveChanges();
+	void ShowSaveFailure(const QString& i_rReason);
+	void UpdateTitle();
 
 	QSettings& m_rSettings;
 	const std::shared_ptr<VQtDispatcher> m_pDispatcher;

@@ -267,6 +267,18 @@ TEST_F(Document, TheScale)
 	EXPECT_EQ(m_Document.TargetValues().m_pSubject->m_Segments[1].m_PreTranslation[0], 300.0);
 	EXPECT_EQ(m_Document.TargetValues().m_pApplicationData, pData);
 
+	const VSubjectParametrised scaled = Target();
+	subject.m_Segments[1].m_PreTranslation[0] = "3*Age";
+	m_Document.SetTargetSubjectParametrised(subject);
+	m_Document.SetTargetScale(3.0);
+	EXPECT_EQ(log.Take(),
+	    "3 RetargetSetup: The scale stays: another one takes the place of the dynamic parameters 'Age', which the "
+	    "target subject needs");
+	EXPECT_EQ(Target(), subject);
+	EXPECT_EQ(m_Document.SaveTargetSubject(m_Folder / "a.qrr"), 0u);
+	m_Document.SetTargetSubjectParametrised(scaled);
+	log.Take();
+
 	m_Changes = 0;
 	for (const double scale :
 	    {0.0, -1.0, std::numeric_limits<double>::infinity(), std::numeric_limits<double>::quiet_NaN()})

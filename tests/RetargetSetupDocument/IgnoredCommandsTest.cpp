@@ -94,7 +94,8 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	    {"both", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(QUrl("ftp://a/b.qrr")); },
 	        "'ftp://a/b.qrr' is no file on this computer."},
 	    {"both", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(Url("no/such/a.qrr")); },
-	        "Nothing was saved: '" + File("no/such/a.qrr") + "' could not be written, and is as it was."},
+	        "Nothing was saved, and '" + File("no/such/a.qrr") + "' is as it was. Could not save '"
+	            + File("no/such/a.qrr") + "': there is no folder '" + File("no/such") + "'"},
 	    {"both", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(Url("a.qrx")); },
 	        "Nothing was saved: '" + File("a.qrx")
 	            + "' is a legacy file, and those are only read. Choose a name that ends in .qrr."},

@@ -7,6 +7,7 @@
 
 #include <QTest>
 
+#include <fstream>
 #include <limits>
 
 namespace
@@ -164,7 +165,59 @@ TEST_F(Handlers, NoStaleNumberIsWrittenBackAfterTheDocumentMoved)
 	m_pDocument->RemoveTarget(1);
 	Run();
 	EXPECT_EQ(Target().m_Targets.at(0).m_Weight, 1.0) << "what was typed goes with its target";
+	const std::string log = TakeLog();
+	EXPECT_NE(log.find("which is gone: it is dropped"), std::string::npos) << log;
+}
+
+TEST_F(Handlers, WhatIsTypedReachesWhatItWasTypedFor)
+{
+	OpenWithTargets();
+	Select(NVX::ESelectionTarget, 2);
+	EXPECT_EQ(Parameter("TargetWeight").SetValueText("9"), "");
+	m_pDocument->RemoveTarget(0);
+	Run();
+	EXPECT_EQ(Target().m_Targets.at(1).m_Weight, 9.0) << "where it stands now";
 	EXPECT_EQ(TakeLog(), "");
+
+	const std::string file = (m_Folder / "a.qrr").string();
+	ASSERT_EQ(m_pDocument->SaveTargetSubject(file), 0u);
+	Select(NVX::ESelectionTarget, 0);
+	TakeLog();
+	EXPECT_EQ(Parameter("TargetWeight").SetValueText("11"), "");
+	EXPECT_EQ(Parameter("TargetScale").SetValueText("3"), "");
+	ASSERT_EQ(m_pDocument->LoadTargetSubject(file), 0u);
+	Run();
+	EXPECT_EQ(Target().m_Targets.at(0).m_Weight, 1.0);
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 1.0);
+	EXPECT_EQ(Text("TargetScale"), "1");
+	const std::string log = TakeLog();
+	EXPECT_NE(log.find("The scale 3 was typed for another target subject"), std::string::npos) << log;
+	EXPECT_NE(log.find("which is gone: it is dropped"), std::string::npos) << log;
+
+	// The document changes between the typing and its being heard of.
+	Select(NVX::ESelectionTarget, 0);
+	m_pDocument->RemoveUnnecessaryJoints();
+	EXPECT_EQ(Parameter("TargetWeight").SetValueText("12"), "");
+	EXPECT_EQ(Parameter("TargetScale").SetValueText("2"), "");
+	Run();
+	EXPECT_EQ(Target().m_Targets.at(0).m_Weight, 12.0);
+	EXPECT_EQ(m_pDocument->GetTargetScale(), 2.0);
+}
+
+TEST_F(Handlers, SeveralRootBonesAreToldUnlessOneIsChosen)
+{
+	OpenDemo();
+	m_Context.Folders().SetFolder("FolderSkins", RETARGET_TEST_DATA "/fbx/cases");
+	Run();
+	EXPECT_EQ(Type("TargetFBX", "plain_parents"), "");
+	for (const char* const pRoot : {"", "1", "0"})
+	{
+		if (*pRoot)
+			Type("TargetRoot", pRoot);
+		TakeLog();
+		m_pDocument->CreateTargetSubject();
+		EXPECT_EQ(TakeLog().find("root bones, and no root was chosen") != std::string::npos, !*pRoot) << pRoot;
+	}
 }
 
 TEST_F(Handlers, ScaleFollowsTheFileAndKeepsItsParameters)
@@ -230,6 +283,53 @@ TEST_F(Handlers, AnFBXFileBringsItsBones)
 	EXPECT_EQ(Target().m_Segments[0].m_Name, "loin") << "nothing is built before the command";
 	EXPECT_EQ(Type("TargetFBX", "(None)"), "");
 	EXPECT_TRUE(m_pDocument->GetFBXSkeleton()) << "no choice ends the handler";
+}
+
+TEST_F(Handlers, AFileThatGivesNothingIsToldWhileItIsChosen)
+{
+	OpenDemo();
+	std::ofstream((m_Folder / "broken.fbx").string()) << "no such thing";
+	std::ofstream((m_Folder / "broken.qrs").string()) << "no such thing";
+	const struct
+	{
+		const char* m_pParameter;
+		std::string m_File;
+		std::string m_Log;
+		std::string m_Remarks;
+	} rows[] = {
+	    {"TargetFBX", (m_Folder / "broken.fbx").string(),
+	        "gives no skeleton: File is not an FBX file. The one of 'character' stays",
+	        "broken.fbx gives no skeleton: File is not an FBX file. Root and \"Create Target Subject\" are still "
+	        "those of character."},
+	    {"SourceSkeleton", (m_Folder / "broken.qrs").string(), "still showing 'performer'",
+	        "broken.qrs cannot be read: the source is still performer.\nbroken.fbx gives no skeleton: File is not an "
+	        "FBX "
+	        "file. Root and \"Create Target Subject\" are still those of character."},
+	    {"TargetFBX", RETARGET_TEST_DATA "/fbx/cases/no_skeleton.fbx",
+	        "gives no skeleton: It holds no skeleton. There is none now",
+	        "broken.qrs cannot be read: the source is still performer.\nno_skeleton.fbx gives no skeleton: It holds no "
+	        "skeleton. There is nothing to create a target subject from."},
+	    {"SourceSkeleton", c_DemoSource, "",
+	        "no_skeleton.fbx gives no skeleton: It holds no skeleton. There is nothing to create a target subject "
+	        "from."},
+	    {"TargetFBX", c_DemoFBX, "", ""}};
+	for (const auto& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_File);
+		TakeLog();
+		Parameter(rRow.m_pParameter).SetValue(ToVariant(rRow.m_File));
+		Run();
+		const std::string log = TakeLog();
+		EXPECT_NE(log.find(rRow.m_Log), std::string::npos) << log;
+		EXPECT_EQ(m_pWidget->Remarks().toStdString(), rRow.m_Remarks);
+	}
+	EXPECT_EQ(Property("remarks", "text").toString(), "");
+	m_pDocument->CreateTargetSubject();
+	Parameter("TargetFBX").SetValue(ToVariant(std::string(RETARGET_TEST_DATA "/fbx/heaps_biped_zup_a7100.fbx")));
+	Run();
+	EXPECT_EQ(m_pWidget->Remarks().toStdString(),
+	    "The target subject is of character. FBX and root above are of heaps_biped_zup_a7100, for the next \"Create "
+	    "Target Subject\".");
 }
 
 TEST_F(Handlers, SourcesAreNeverLookedForWhereTheProcessRuns)

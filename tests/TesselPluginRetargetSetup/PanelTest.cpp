@@ -19,17 +19,34 @@ class Panel : public VPanelTest
 protected:
 	void Click(const QString& i_rObjectName)
 	{
+		Tap(i_rObjectName);
+		Run();
+	}
+
+	/// So short a click that nothing that was posted runs before it ends.
+	void Tap(const QString& i_rObjectName)
+	{
 		if (!m_pWidget->isVisible())
 		{
 			m_pWidget->resize(1280, 800);
 			m_pWidget->show();
+			m_pWidget->activateWindow();
+			EXPECT_TRUE(QTest::qWaitForWindowActive(m_pWidget.get()));
 			Run();
 		}
 		const QQuickItem* const pItem = Item(i_rObjectName);
 		ASSERT_TRUE(pItem);
 		QTest::mouseClick(m_pWidget.get(), Qt::LeftButton, {},
 		    pItem->mapToScene({pItem->width() / 2, pItem->height() / 2}).toPoint());
-		Run();
+	}
+
+	/// Types in a field, and leaves it open.
+	void Write(const QString& i_rField, const QString& i_rText)
+	{
+		Click(i_rField);
+		QTest::keyClick(m_pWidget.get(), Qt::Key_A, Qt::ControlModifier);
+		QTest::keyClicks(m_pWidget.get(), i_rText);
+		EXPECT_EQ(Property(i_rField, "text").toString(), i_rText);
 	}
 
 	VSceneFramebufferObject& Scene() const { return *qobject_cast<VSceneFramebufferObject*>(Item("scene")); }
@@ -320,6 +337,59 @@ TEST_F(Panel, AddsAndRemovesTargetsOfTheSelection)
 	EXPECT_TRUE(Property("jointSymmetry", "checked").toBool());
 }
 
+TEST_F(Panel, ACommandActsOnWhatIsSeen)
+{
+	OpenDemo();
+	m_Context.Folders().SetFolder("FolderSkins", RETARGET_TEST_DATA "/fbx");
+	Run();
+	EXPECT_EQ(Type("TargetFBX", "kenney_medium_b7400"), "");
+	// Chosen just before.
+	EXPECT_EQ(Parameter("TargetFBX").SetValueText("heaps_biped_zup_a7100"), "");
+	Tap("createTargetSubject");
+	Run();
+	EXPECT_EQ(m_pDocument->TargetValues().m_pApplicationData->m_Skin, "heaps_biped_zup_a7100");
+
+	auto& rSelection = m_Context.SelectionManager().Selection();
+	for (const std::uint32_t segment : {2u, 4u, 6u})
+	{
+		const auto select = [&](std::uint32_t i_Index)
+		{
+			rSelection.Replace({{NVX::ESelectionSourceSegment, RetargetSetup::c_SubjectId, i_Index, {}},
+			    {NVX::ESelectionTargetSegment, RetargetSetup::c_SubjectId, i_Index, {}}});
+		};
+		select(1);
+		Run();
+		select(segment);
+		Tap("addPositionTarget");
+		Run();
+		EXPECT_EQ(Target().m_Targets.back().m_SegmentIndices, (std::vector<std::uint32_t>{segment}));
+	}
+	const auto state = [this](std::size_t i_Target) { return Target().m_Targets[i_Target].m_StateExpressions[0]; };
+	const std::string measured = state(0);
+	const std::string last = state(2);
+
+	Select(NVX::ESelectionTarget, 0);
+	Write("TargetStateExpressionX", "77");
+	Tap("createAllJoints");
+	EXPECT_EQ(state(0), "77.000000*GlobalScale");
+	Run();
+	Write("TargetStateExpressionX", "78");
+	Tap("updateTargets");
+	Run();
+	EXPECT_EQ(state(0), measured) << "what is measured counts, not what was typed before";
+	Write("TargetWeight", "5");
+	QTest::keyClick(m_pWidget.get(), Qt::Key_T, Qt::AltModifier);
+	Run();
+	EXPECT_EQ(Target().m_Targets[0].m_Weight, 5.0);
+	Write("TargetStateExpressionX", "79");
+	Tap("removeTarget");
+	Run();
+	EXPECT_EQ(Target().m_Targets.size(), 3u) << "one was added, one is gone";
+	EXPECT_EQ(state(1), last);
+	for (const auto& rTarget : Target().m_Targets)
+		EXPECT_EQ(rTarget.m_StateExpressions[0].find("79"), std::string::npos) << "it went with its target";
+}
+
 TEST_F(Panel, ListsStayWhereTheyWereScrolledTo)
 {
 	OpenDemo();
@@ -337,10 +407,17 @@ TEST_F(Panel, RemembersWhatWasLoadedAndNothingElse)
 	OpenDemo();
 	Click("createTargetSubject");
 	EXPECT_FALSE(Property("save", "enabled").toBool()) << "a new subject has no file yet";
-	m_pDocument->SaveTargetSubjectURL(Url("a b.qrr"));
+	m_pDocument->SaveTargetSubjectURL(Url("none/a b.qrr"));
 	m_pDocument->LoadTargetSubjectURL(Url("none.qrr"));
 	Run();
 	EXPECT_EQ(Property("currentFile", "text").toString(), "Current file: *None*");
+	EXPECT_TRUE(Property("unsavedMark", "visible").toBool());
+	m_pDocument->SaveTargetSubjectURL(Url("a b.qrr"));
+	Run();
+	EXPECT_EQ(Property("currentFile", "text").toString(), "Current file: a b.qrr");
+	EXPECT_FALSE(Property("unsavedMark", "visible").toBool());
+	Click("createTargetSubject");
+	EXPECT_EQ(Property("currentFile", "text").toString(), "Current file: *None*") << "one that is made has no file";
 	m_pDocument->LoadTargetSubjectURL(Url("a b.qrr"));
 	Run();
 	EXPECT_EQ(Property("currentFile", "text").toString(), "Current file: a b.qrr");

@@ -32,6 +32,8 @@
 #include <QTest>
 #include <QTimer>
 
+#include <functional>
+
 namespace
 {
 
@@ -103,6 +105,31 @@ protected:
 		return true;
 	}
 	bool Drop(const QStringList& i_rFiles) { return Drop(i_rFiles, *m_pWindow); }
+
+	QObject& Document()
+	{
+		return *dynamic_cast<NVX::IQuickWidget*>(m_pWindow->RetargetPanel()->Widget())
+		            ->contextProperty("ContextRetargetSetup")
+		            .value<QObject*>();
+	}
+
+	/// Runs what asks, and answers; a test failure if nothing asks.
+	/// @return what is asked.
+	QString Answer(QMessageBox::StandardButton i_Button, const std::function<void()>& i_rAsk)
+	{
+		QString asked;
+		QTimer::singleShot(0, m_pWindow.get(),
+		    [&]
+		    {
+			    auto* const pBox = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+			    ASSERT_TRUE(pBox);
+			    asked = pBox->text();
+			    pBox->button(i_Button)->click();
+		    });
+		i_rAsk();
+		EXPECT_FALSE(asked.isEmpty());
+		return asked;
+	}
 
 	QStringList RecentFiles() { return m_Settings.value("RecentFiles").toStringList(); }
 
@@ -288,11 +315,8 @@ TEST_F(Window, AsksBeforeUnsavedChangesAreLost)
 	ASSERT_TRUE(m_pWindow->Open(target));
 	EXPECT_TRUE(m_pWindow->close()) << "nothing has changed yet";
 
-	QObject* const pDocument = dynamic_cast<NVX::IQuickWidget*>(m_pWindow->RetargetPanel()->Widget())
-	                               ->contextProperty("ContextRetargetSetup")
-	                               .value<QObject*>();
 	m_pWindow->show();
-	QMetaObject::invokeMethod(pDocument, "RemoveUnnecessaryJoints");
+	QMetaObject::invokeMethod(&Document(), "RemoveUnnecessaryJoints");
 	const struct
 	{
 		QMessageBox::StandardButton m_Answer;
@@ -303,21 +327,74 @@ TEST_F(Window, AsksBeforeUnsavedChangesAreLost)
 	for (const auto& rRow : rows)
 	{
 		m_pWindow->show();
-		bool bAsked = false;
-		QTimer::singleShot(0, m_pWindow.get(),
-		    [&]
-		    {
-			    auto* const pBox = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
-			    ASSERT_TRUE(pBox);
-			    bAsked = true;
-			    pBox->button(rRow.m_Answer)->click();
-		    });
-		EXPECT_EQ(m_pWindow->close(), rRow.m_bCloses);
-		EXPECT_TRUE(bAsked);
+		EXPECT_EQ(Answer(rRow.m_Answer, [&] { EXPECT_EQ(m_pWindow->close(), rRow.m_bCloses); }),
+		    "performer.qrr has changes that are not saved.");
 		EXPECT_EQ(ReadFile(target) != before, rRow.m_bSaves);
 	}
 	m_pWindow->show();
 	EXPECT_TRUE(m_pWindow->close()) << "all is saved";
+}
+
+TEST_F(Window, AsksBeforeAnotherSubjectTakesThePlace)
+{
+	LoadPanel();
+	const QString a = Path("a.qrr");
+	const QString b = Path("b.qrr");
+	ASSERT_TRUE(QFile::copy(c_Source, a) && QFile::copy(c_Source, b));
+	const auto edit = [this] { QMetaObject::invokeMethod(&Document(), "RemoveUnnecessaryJoints"); };
+	const auto create = [this] { QMetaObject::invokeMethod(&Document(), "CreateTargetSubject"); };
+	const auto state = [this]
+	{
+		RunEvents();
+		return m_pWindow->windowTitle() + (m_pWindow->isWindowModified() ? " unsaved" : "");
+	};
+	EXPECT_EQ(state(), "Retarget Studio");
+	ASSERT_TRUE(m_pWindow->Open(a) && m_pWindow->Open(c_Fbx));
+	EXPECT_EQ(state(), "a.qrr[*] - Retarget Studio");
+	edit();
+	EXPECT_EQ(state(), "a.qrr[*] - Retarget Studio unsaved");
+	const QString asked = "a.qrr has changes that are not saved.";
+	EXPECT_EQ(Answer(QMessageBox::Cancel, [&] { m_pWindow->Open(b); }), asked);
+	EXPECT_EQ(state(), "a.qrr[*] - Retarget Studio unsaved");
+	EXPECT_EQ(RecentFiles(), (QStringList{c_Fbx, a}));
+	EXPECT_EQ(Answer(QMessageBox::Cancel, create), asked);
+	EXPECT_EQ(Answer(QMessageBox::Discard, [&] { Drop({b}); }), asked);
+	EXPECT_EQ(state(), "b.qrr[*] - Retarget Studio");
+	EXPECT_EQ(ReadFile(a), ReadFile(b));
+	edit();
+	Answer(QMessageBox::Save, [this] { m_pWindow->findChild<QMenu*>("RecentMenu")->actions()[2]->trigger(); });
+	EXPECT_EQ(state(), "a.qrr[*] - Retarget Studio");
+	EXPECT_NE(ReadFile(a), ReadFile(b));
+	create();
+	EXPECT_EQ(state(), "New retarget subject[*] - Retarget Studio unsaved");
+	EXPECT_FALSE(RootProperty("currentTargetSubjectURL").toUrl().isValid()) << "it is no longer of the file";
+	create();
+	edit();
+	EXPECT_EQ(Answer(QMessageBox::Discard, [&] { m_pWindow->Open(b); }),
+	    "The retarget subject has changes that are in no file.");
+}
+
+TEST_F(Window, AFailedSaveIsShown)
+{
+	LoadPanel();
+	const QString file = Path("a.qrr");
+	ASSERT_TRUE(QFile::copy(c_Source, file) && m_pWindow->Open(file));
+	QMetaObject::invokeMethod(&Document(), "RemoveUnnecessaryJoints");
+	ASSERT_TRUE(QFile::remove(file) && QDir().mkdir(file));
+	const QStringList recent = RecentFiles();
+	const auto failure = [this] { return m_pWindow->findChild<QMessageBox*>("SaveFailure"); };
+	Action("Save").trigger();
+	ASSERT_TRUE(failure());
+	EXPECT_TRUE(failure()->informativeText().contains("it is a folder")) << failure()->informativeText().toStdString();
+	delete failure();
+	m_pWindow->RetargetPanel()->SaveTo(Path("none/b.qrr"));
+	ASSERT_TRUE(failure());
+	delete failure();
+	EXPECT_EQ(RecentFiles(), recent);
+	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(file));
+	EXPECT_TRUE(m_pWindow->isWindowModified());
+	Answer(QMessageBox::Save, [this] { EXPECT_FALSE(m_pWindow->close()) << "what was not saved is not lost"; });
+	delete failure();
 }
 
 TEST_F(Window, PreferencesHaveARowForEachFolder)

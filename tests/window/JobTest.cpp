@@ -97,11 +97,31 @@ TEST_F(Job, TheWholeJob)
 
 	rOperator.Click("removeTarget");
 	EXPECT_EVENTUALLY(Targets() == 5);
+	EXPECT_EVENTUALLY(rOperator.Property("unsavedMark", "visible").toBool());
+	rOperator.AnswerNextQuestion("job.qrr has changes that are not saved.", QMessageBox::Discard);
 	rOperator.Click("load");
 	rOperator.AnswerDialog(File("job.qrr"));
 	EXPECT_EVENTUALLY(Targets() == 6);
 	rOperator.Click("save");
 	EXPECT_TRUE(Content("job.qrr") == saved);
+
+	// A name without its extension gets it, and a file of that name is not lost without a question.
+	rOperator.Click("saveAs");
+	rOperator.AnswerDialog(File("other.take"));
+	EXPECT_EVENTUALLY(rOperator.Property("currentFile", "text").toString() == "Current file: other.take.qrr");
+	EXPECT_TRUE(Content("other.take.qrr") == saved);
+	rOperator.Click("updateTargets");
+	for (const auto answer : {QMessageBox::No, QMessageBox::Yes})
+	{
+		rOperator.AnswerNextQuestion("job.qrr is there already. Do you want to replace it?", answer);
+		rOperator.Click("saveAs");
+		rOperator.AnswerDialog(File("job"));
+		if (answer == QMessageBox::No)
+		{
+			EXPECT_TRUE(Content("job.qrr") == saved);
+		}
+	}
+	EXPECT_EVENTUALLY(Content("job.qrr") != saved);
 }
 
 TEST_F(Job, SelectsWithMouseAndKeys)

@@ -5,6 +5,7 @@
 
 #include <gtest/gtest.h>
 
+#include <QAbstractButton>
 #include <QApplication>
 #include <QComboBox>
 #include <QFileDialog>
@@ -188,6 +189,25 @@ void VOperator::ChooseInNextDialog(
 		    EXPECT_EVENTUALLY(pBox->currentText() == i_rEntry);
 		    const auto* const pButton = pDialog->findChild<QWidget*>(i_pButton);
 		    click(*pButton, pButton->rect().center());
+	    });
+	pTimer->start(10);
+}
+
+void VOperator::AnswerNextQuestion(const QString& i_rQuestion, QMessageBox::StandardButton i_Button)
+{
+	auto* const pTimer = new QTimer(&m_rWindow);
+	QObject::connect(pTimer, &QTimer::timeout, pTimer,
+	    [=]
+	    {
+		    auto* const pBox = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+		    if (!pBox || !pBox->windowHandle() || !pBox->windowHandle()->isExposed())
+			    return;
+		    pTimer->deleteLater();
+		    pTimer->stop();
+		    EXPECT_EQ(pBox->text(), i_rQuestion);
+		    const QWidget* const pButton = pBox->button(i_Button);
+		    ASSERT_TRUE(pButton);
+		    QTest::mouseClick(pBox->windowHandle(), Qt::LeftButton, {}, pButton->mapTo(pBox, pButton->rect().center()));
 	    });
 	pTimer->start(10);
 }

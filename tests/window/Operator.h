@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QImage>
+#include <QMessageBox>
 #include <QPointF>
 #include <QString>
 #include <QStringList>
@@ -44,6 +45,8 @@ public:
 	/// In a box of a dialog that keeps the keyboard until it is answered, as soon as it opens: picks the entry with
 	/// this text, then the dialog's button.
 	void ChooseInNextDialog(const char* i_pDialog, const char* i_pBox, const QString& i_rEntry, const char* i_pButton);
+	/// In a question that keeps the keyboard until it is answered, as soon as it opens.
+	void AnswerNextQuestion(const QString& i_rQuestion, QMessageBox::StandardButton i_Button);
 	/// What stands on the screen around a place of the preview.
 	QImage See(const QPointF& i_rPlace, int i_Reach) const;
 

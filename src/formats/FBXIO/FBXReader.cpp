@@ -34,6 +34,7 @@ public:
 	float m_NodeScale = 1.0f;
 	int m_UpAxis = 0;
 	bool m_bComplete = false;
+	std::string m_Error;
 	FBXMeshReader m_MeshReader;
 	std::shared_ptr<VSkinSkeleton> m_pSkeleton;
 	VProgress m_Progress;
@@ -71,6 +72,7 @@ bool FBXIO::FBXReader::VImpl::LoadFile(const std::string& i_rPath)
 	if (status(path, error).type() != boost::filesystem::regular_file)
 	{
 		NVX_LOG("FBXIO", NVX::ELogError, "File %1% not found", i_rPath);
+		m_Error = "There is no such file";
 		return false;
 	}
 	const boost::uintmax_t bytes = file_size(path, error);
@@ -123,7 +125,8 @@ bool FBXIO::FBXReader::VImpl::Load(
 void FBXIO::FBXReader::VImpl::TellRefusal(const std::string& i_rPath)
 {
 	NVX_LOG("FBXIO", NVX::ELogError, "Call to KFbxImporter::Initialize() failed.");
-	NVX_LOG("FBXIO", NVX::ELogError, "Error returned: %1%", m_pImporter->GetStatus().GetErrorString());
+	m_Error = m_pImporter->GetStatus().GetErrorString();
+	NVX_LOG("FBXIO", NVX::ELogError, "Error returned: %1%", m_Error);
 	int major = 0, minor = 0, revision = 0;
 	m_pImporter->GetFileVersion(major, minor, revision);
 	if (m_pImporter->GetStatus().GetCode() == FbxStatus::eInvalidFileVersion)
@@ -144,10 +147,11 @@ void FBXIO::FBXReader::VImpl::Import()
 	m_bComplete = m_pImporter->Import(m_pScene, false);
 	if (m_bComplete)
 		return;
+	m_Error = m_pImporter->GetStatus().GetErrorString();
 	if (m_pImporter->GetStatus().GetCode() == FbxStatus::ePasswordError)
 		NVX_LOG("FBXIO", NVX::ELogError, "FBX Importer: password Required");
 	else
-		NVX_LOG("FBXIO", NVX::ELogError, "Error returned: %1%", m_pImporter->GetStatus().GetErrorString());
+		NVX_LOG("FBXIO", NVX::ELogError, "Error returned: %1%", m_Error);
 }
 
 void FBXIO::FBXReader::VImpl::ReadSettings()
@@ -275,6 +279,11 @@ void FBXIO::FBXReader::SetProgress(VProgress i_Progress)
 void FBXIO::FBXReader::SetMeshRules(const VMeshRules& i_rRules)
 {
 	m_pImpl->m_MeshReader.SetRules(i_rRules);
+}
+
+const std::string& FBXIO::FBXReader::GetError() const
+{
+	return m_pImpl->m_Error;
 }
 
 bool FBXIO::FBXReader::IsComplete() const

@@ -39,6 +39,9 @@ public:
 	/// False if the import broke off: what was read until then is there.
 	bool IsComplete() const;
 
+	/// Why the file was refused, or where the import broke off; empty if neither.
+	const std::string& GetError() const;
+
 	bool HasSkeleton() const;
 
 	/// 0 for X, 1 for Y, 2 for Z.

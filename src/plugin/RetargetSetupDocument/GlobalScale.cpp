@@ -1,6 +1,9 @@
 #include "RetargetSetupDocument/GlobalScale.h"
 
+#include "CoreOrlexTypesUtils/UnusedParameters.h"
+
 #include <cmath>
+#include <set>
 
 using CoreOrlexTypes::VSubjectParametrised;
 
@@ -16,6 +19,16 @@ const VSubjectParametrised::VDynamicParameter* FindScale(const VSubjectParametri
 		if (rParameter.m_Name == c_GlobalScaleName)
 			return &rParameter;
 	return nullptr;
+}
+
+template <typename TCounts>
+std::string JoinedNames(const VSubjectParametrised& i_rSubject, const TCounts& i_rCounts)
+{
+	std::string names;
+	for (const VSubjectParametrised::VDynamicParameter& rParameter : i_rSubject.m_DynamicParameters)
+		if (i_rCounts(rParameter))
+			names += (names.empty() ? "" : "', '") + rParameter.m_Name;
+	return names;
 }
 
 } // namespace
@@ -43,11 +56,15 @@ double GetGlobalScale(const VSubjectParametrised& i_rSubject)
 std::string DroppedParameters(const VSubjectParametrised& i_rSubject)
 {
 	const VSubjectParametrised::VDynamicParameter* const pScale = FindScale(i_rSubject);
-	std::string names;
-	for (const VSubjectParametrised::VDynamicParameter& rParameter : i_rSubject.m_DynamicParameters)
-		if (&rParameter != pScale)
-			names += (names.empty() ? "" : "', '") + rParameter.m_Name;
-	return names;
+	return JoinedNames(i_rSubject, [pScale](const auto& i_rParameter) { return &i_rParameter != pScale; });
+}
+
+std::string LostParameters(const VSubjectParametrised& i_rSubject)
+{
+	const std::set<std::string> used = CoreOrlexTypesUtils::ParametersInUse(i_rSubject);
+	return JoinedNames(i_rSubject,
+	    [&used](const auto& i_rParameter)
+	    { return i_rParameter.m_Name != c_GlobalScaleName && used.count(i_rParameter.m_Name) > 0; });
 }
 
 } // namespace RetargetSetup

@@ -20,4 +20,7 @@ double GetGlobalScale(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
 /// The names of the dynamic parameters that SetGlobalScale would drop, joined by "', '"; empty if it drops none.
 std::string DroppedParameters(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
 
+/// Those of them, in the same form, that expressions use, which would then have no value.
+std::string LostParameters(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
+
 } // namespace RetargetSetup

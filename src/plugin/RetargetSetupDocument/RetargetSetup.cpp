@@ -7,6 +7,8 @@
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/IgnoredCommands.h"
 
+#include <algorithm>
+
 using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
@@ -74,10 +76,10 @@ void VRetargetSetup::SetJointSymmetry(bool i_bJointSymmetry)
 	emit jointSymmetryChanged();
 }
 
-void VRetargetSetup::SetTargetRootIndex(std::uint32_t i_RootIndex)
+void VRetargetSetup::SetTargetRootIndex(std::uint32_t i_RootIndex, bool i_bChosen)
 {
 	m_TargetRootIndex = i_RootIndex;
-	m_bTargetRootChosen = true;
+	m_bTargetRootChosen = i_bChosen;
 }
 
 void VRetargetSetup::SetTargetScale(double i_Scale)
@@ -88,11 +90,19 @@ void VRetargetSetup::SetTargetScale(double i_Scale)
 		    i_Scale);
 		return;
 	}
-	m_TargetScale = i_Scale;
 	const std::shared_ptr<const VSubjectParametrised> pOld = TargetValues().m_pParametrised;
+	const std::string dropped = pOld ? RetargetSetup::DroppedParameters(*pOld) : "";
+	if (const std::string lost = dropped.empty() ? "" : RetargetSetup::LostParameters(*pOld); !lost.empty())
+	{
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "The scale stays: another one takes the place of the dynamic parameters '%1%', which the target subject needs",
+		    lost);
+		return;
+	}
+	m_TargetScale = i_Scale;
 	if (!pOld)
 		return;
-	if (const std::string dropped = RetargetSetup::DroppedParameters(*pOld); !dropped.empty())
+	if (!dropped.empty())
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The new scale drops the dynamic parameters '%1%'", dropped);
 	VSubjectParametrised subject = *pOld;
 	RetargetSetup::SetGlobalScale(subject, i_Scale);
@@ -148,8 +158,8 @@ void VRetargetSetup::SetSourceSubject(VSubjectParametrised i_Parametrised, VSubj
 bool VRetargetSetup::SetTargetSubject(VSubjectParametrised i_Parametrised, VSubjectApplicationData i_ApplicationData,
     CoreOrlexQRTIO::VSubjectQRTExtras i_Extras)
 {
-	if (!Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
-	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData))))
+	if (!ReplaceTargetItems(std::move(i_Parametrised),
+	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)), NewIdentities()))
 		return false;
 	m_TargetExtras = std::move(i_Extras);
 	return true;
@@ -157,7 +167,10 @@ bool VRetargetSetup::SetTargetSubject(VSubjectParametrised i_Parametrised, VSubj
 
 void VRetargetSetup::SetTargetSubjectParametrised(VSubjectParametrised i_Parametrised)
 {
-	Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)), nullptr);
+	VIdentities identities = m_Identities;
+	if (i_Parametrised.m_Targets.size() != identities.m_Targets.size())
+		identities.m_Targets.clear();
+	ReplaceTargetItems(std::move(i_Parametrised), nullptr, std::move(identities));
 }
 
 void VRetargetSetup::Ignore(const char* i_pCommand, const QString& i_rReason)
@@ -166,13 +179,43 @@ void VRetargetSetup::Ignore(const char* i_pCommand, const QString& i_rReason)
 }
 
 bool VRetargetSetup::ReplaceTarget(const char* i_pCommand, VSubjectParametrised i_Parametrised,
-    std::shared_ptr<const VSubjectApplicationData> i_pApplicationData)
+    std::shared_ptr<const VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities)
 {
-	const bool bReplaced = Replace(m_TargetItems,
-	    std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)), std::move(i_pApplicationData));
+	const bool bReplaced =
+	    ReplaceTargetItems(std::move(i_Parametrised), std::move(i_pApplicationData), std::move(i_Identities));
 	if (!bReplaced)
 		Ignore(i_pCommand, RetargetSetup::Ignored::c_HostRefused);
 	return bReplaced;
+}
+
+bool VRetargetSetup::ReplaceTargetItems(VSubjectParametrised i_Parametrised,
+    std::shared_ptr<const VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities)
+{
+	while (i_Identities.m_Targets.size() < i_Parametrised.m_Targets.size())
+		i_Identities.m_Targets.push_back(++m_LastIdentity);
+	// The change signal fires within, and whoever hears it may ask.
+	std::swap(m_Identities, i_Identities);
+	if (Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
+	        std::move(i_pApplicationData)))
+	{
+		emit unsavedChangesChanged();
+		return true;
+	}
+	std::swap(m_Identities, i_Identities);
+	return false;
+}
+
+std::uint64_t VRetargetSetup::TargetIdentity(std::int32_t i_TargetIndex) const
+{
+	const std::vector<std::uint64_t>& rTargets = m_Identities.m_Targets;
+	return std::uint32_t(i_TargetIndex) < rTargets.size() ? rTargets[std::size_t(i_TargetIndex)] : 0;
+}
+
+std::int32_t VRetargetSetup::TargetOfIdentity(std::uint64_t i_Identity) const
+{
+	const std::vector<std::uint64_t>& rTargets = m_Identities.m_Targets;
+	const auto found = std::find(rTargets.begin(), rTargets.end(), i_Identity);
+	return found == rTargets.end() ? -1 : std::int32_t(found - rTargets.begin());
 }
 
 VRetargetSetup::VSubjectValues VRetargetSetup::ValuesOf(const VSubjectItems& i_rItems)

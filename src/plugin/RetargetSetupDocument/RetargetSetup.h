@@ -20,6 +20,7 @@
 
 #include <memory>
 #include <string>
+#include <vector>
 
 namespace ComputeSubject
 {
@@ -39,6 +40,8 @@ class VRetargetSetup : public QObject
 	Q_OBJECT
 	/// Read by the preview at each drag: a bind pose is mirrored to the segment on the other side.
 	Q_PROPERTY(bool jointSymmetry READ JointSymmetry WRITE SetJointSymmetry NOTIFY jointSymmetryChanged)
+	/// Read by whoever marks the file's name.
+	Q_PROPERTY(bool unsavedChanges READ HasUnsavedChanges NOTIFY unsavedChangesChanged)
 
 public:
 	/// A subject in its three forms. Null what there is not; shared, and never changed.
@@ -58,7 +61,7 @@ public:
 	void SetHostRules(std::shared_ptr<TesselPluginInterface::IHostRules> i_pRules);
 
 	/// Makes the target subject anew from the FBX skeleton, from the root bone on and with the target scale. Targets,
-	/// joint edits and bind poses of the one before are lost.
+	/// joint edits and bind poses of the one before are lost. It is of no file.
 	Q_INVOKABLE void CreateTargetSubject();
 	Q_INVOKABLE void LoadTargetSubjectURL(const QUrl& i_rFileURL);
 	Q_INVOKABLE void SaveTargetSubjectURL(const QUrl& i_rFileURL);
@@ -78,7 +81,7 @@ public:
 	/// Recalculates the offset of each target from the present bind poses.
 	Q_INVOKABLE void UpdateTargets();
 
-	/// True if the target subject is not what was last loaded or saved: closing would lose it.
+	/// True if the target subject is not what was last loaded or saved, or was made since: closing would lose it.
 	Q_INVOKABLE bool HasUnsavedChanges() const;
 
 	bool JointSymmetry() const { return m_bJointSymmetry; }
@@ -88,13 +91,22 @@ public:
 	/// old skeleton stays, and if it has no skeleton.
 	bool LoadTargetFBX(const boost::filesystem::path& i_rPath);
 
+	/// Why the latest FBX file could not be read or has no skeleton, or where it broke off, as a sentence; empty if it
+	/// is whole.
+	const std::string& GetTargetFBXError() const { return m_TargetFBXError; }
+
+	/// Stem of the FBX file that the skeleton is of.
+	const std::string& GetTargetName() const { return m_TargetName; }
+
 	/// False if the latest FBX file broke off and the skeleton is what was read until then.
 	bool IsTargetFBXComplete() const { return m_bTargetFBXComplete; }
 
 	/// Index into the FBX skeleton; takes effect with the next CreateTargetSubject.
-	void SetTargetRootIndex(std::uint32_t i_RootIndex);
+	/// @param i_bChosen false for a default, with which it is told that the file has other root bones.
+	void SetTargetRootIndex(std::uint32_t i_RootIndex, bool i_bChosen = true);
 
-	/// Takes effect on the target subject at once. Anything but a finite number above 0 is refused, which is told.
+	/// Takes effect on the target subject at once. Anything but a finite number above 0 is refused, and every scale for
+	/// a subject whose expressions use other dynamic parameters than GlobalScale, since those go; both are told.
 	void SetTargetScale(double i_Scale);
 
 	/// The scale of the next CreateTargetSubject, with no change of the target subject that is there. What
@@ -125,12 +137,21 @@ public:
 	bool SetTargetSubject(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
 	    CoreOrlexTypes::VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras = {});
 
-	/// An edit that leaves the application data and the extras as they are.
+	/// An edit that leaves the application data and the extras as they are. The targets stay the ones that they are if
+	/// there are as many as before.
 	void SetTargetSubjectParametrised(CoreOrlexTypes::VSubjectParametrised i_Parametrised);
 
 	/// The values without copies.
 	VSubjectValues SourceValues() const { return ValuesOf(m_SourceItems); }
 	VSubjectValues TargetValues() const { return ValuesOf(m_TargetItems); }
+
+	/// What the targets are told apart by, whatever places they move to: one that is removed takes its number along. A
+	/// subject that replaces another brings new ones. 0 for a target that is not there.
+	std::uint64_t TargetIdentity(std::int32_t i_TargetIndex) const;
+	/// Where the target stands now; -1 if it is gone.
+	std::int32_t TargetOfIdentity(std::uint64_t i_Identity) const;
+	/// Another one after each subject that was made, loaded or set as a whole; 0 without a target subject.
+	std::uint64_t TargetSubjectIdentity() const { return m_Identities.m_Subject; }
 
 	/// Copies; false, with nothing copied, if there is none.
 	bool GetSourceTemplate(CoreOrlexTypes::VSubject& o_rSubject) const;
@@ -168,8 +189,17 @@ public:
 signals:
 	void jointSymmetryChanged();
 
+	/// With each change of the target subject and each save.
+	void unsavedChangesChanged();
+
 	/// After LoadTargetSubjectURL has replaced the target subject, and never for a file that could not be loaded.
 	void targetSubjectLoaded(const QUrl& i_rFileURL);
+
+	/// After SaveTargetSubjectURL has written the whole file.
+	void targetSubjectSaved(const QUrl& i_rFileURL);
+
+	/// After CreateTargetSubject.
+	void targetSubjectCreated();
 
 	/// A command has ended with no change.
 	/// @param i_rCommand the name of the invokable.
@@ -182,6 +212,16 @@ private:
 		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pSubject;
 		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pApplicationData;
 		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pParametrised;
+	};
+
+	/// SaveTargetSubject.
+	/// @param o_rReason why it failed.
+	std::uint32_t Save(const boost::filesystem::path& i_rPath, std::string& o_rReason);
+
+	struct VIdentities
+	{
+		std::uint64_t m_Subject = 0;
+		std::vector<std::uint64_t> m_Targets;
 	};
 
 	/// As the host has them now.
@@ -199,7 +239,13 @@ private:
 
 	/// Replaces the target subject at the end of a command, which is ignored if the host made no item.
 	bool ReplaceTarget(const char* i_pCommand, CoreOrlexTypes::VSubjectParametrised i_Parametrised,
-	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData);
+	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities);
+
+	/// Replace for the target subject.
+	/// @param i_Identities of the first targets; the others are new.
+	bool ReplaceTargetItems(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
+	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities);
+	VIdentities NewIdentities() { return {++m_LastIdentity, {}}; }
 
 	/// The source subject at rest in its bind pose; null if it has none. Kept until the source subject is another one.
 	const ComputeSubject::VComputeSubjectFK* SourceKinematics();
@@ -226,6 +272,7 @@ private:
 	const std::shared_ptr<VRetargetSetupTargetModel> m_pTargetModel;
 	std::shared_ptr<const FBXIO::VSkinSkeleton> m_pFBXSkeleton;
 	std::string m_TargetName;
+	std::string m_TargetFBXError;
 	std::string m_SourceName;
 	std::string m_ShownSourceName;
 	VSubjectItems m_SourceItems;
@@ -248,6 +295,8 @@ private:
 	std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pSourceFK;
 	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubjectOfSourceFK;
 	CoreOrlexQRTIO::VSubjectQRTExtras m_TargetExtras;
+	VIdentities m_Identities;
+	std::uint64_t m_LastIdentity = 0;
 	bool m_bTargetFBXComplete = true;
 	/// The root bone was chosen since the FBX file was read.
 	bool m_bTargetRootChosen = false;

@@ -89,7 +89,8 @@ bool Differ(const std::shared_ptr<const T>& i_rpA, const std::shared_ptr<const T
 
 /// Reads the file that is about to be written, in memory, and tells what would not come back.
 /// @return false if it could not be read at all, so that it must not replace a file that can.
-bool ReadsBack(const VSubjectRecord& i_rRecord, const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras)
+bool ReadsBack(
+    const VSubjectRecord& i_rRecord, const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras, std::string& o_rReason)
 {
 	std::string text;
 	std::vector<std::string> errors;
@@ -103,8 +104,8 @@ bool ReadsBack(const VSubjectRecord& i_rRecord, const CoreOrlexQRTIO::VSubjectQR
 	        i_rRecord.m_SubjectParametrised.m_SubjectId, read.m_SubjectParametrised, read.m_SubjectApplicationData,
 	        extras, errors, warnings))
 	{
-		NVX_LOG(c_LogCategory, NVX::ELogError, "Nothing was saved, since the file could not be read again: %1%",
-		    errors.empty() ? "" : errors.front());
+		o_rReason = "the file could not be read again" + (errors.empty() ? "" : ": " + errors.front());
+		NVX_LOG(c_LogCategory, NVX::ELogError, "Nothing was saved, since %1%", o_rReason);
 		return false;
 	}
 	const std::string difference = CoreOrlexQRTIO::FileDifference(i_rRecord, std::move(read));
@@ -121,13 +122,17 @@ bool ReadsBack(const VSubjectRecord& i_rRecord, const CoreOrlexQRTIO::VSubjectQR
 bool VRetargetSetup::LoadTargetFBX(const boost::filesystem::path& i_rPath)
 {
 	FBXIO::FBXReader reader;
-	if (!reader.LoadFile(UtilsFileSystem::ToUtf8(i_rPath)))
+	const bool bLoaded = reader.LoadFile(UtilsFileSystem::ToUtf8(i_rPath));
+	m_TargetFBXError = reader.GetError();
+	if (!bLoaded)
 		return false;
 	m_bTargetFBXComplete = reader.IsComplete();
 	m_pFBXSkeleton = reader.GetSkeleton();
 	if (!m_pFBXSkeleton || m_pFBXSkeleton->empty())
 	{
 		m_pFBXSkeleton = nullptr;
+		if (m_TargetFBXError.empty())
+			m_TargetFBXError = "It holds no skeleton";
 		return false;
 	}
 	m_TargetName = RetargetSetup::FileStem(i_rPath);
@@ -188,6 +193,9 @@ void VRetargetSetup::CreateTargetSubject()
 	if (!SetTargetSubject(std::move(subject), std::move(applicationData)))
 		return Ignore(c_Command, Ignored::c_HostRefused);
 	m_MadeTarget = TargetValues();
+	m_SavedTarget = {};
+	emit unsavedChangesChanged();
+	emit targetSubjectCreated();
 }
 
 bool VRetargetSetup::LoadSourceSubject(const boost::filesystem::path& i_rPath, const std::string& i_rSkinName)
@@ -233,27 +241,43 @@ std::uint32_t VRetargetSetup::LoadTargetSubject(const boost::filesystem::path& i
 	if (RetargetSetup::LacksBindPose(rSubject))
 		RetargetSetup::AdoptTPoseAsBindPose(rSubject);
 	std::string sourceName = rApplicationData.m_RetargetSourceTemplate;
-	if (!Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(rSubject)),
-	        std::make_shared<const VSubjectApplicationData>(std::move(rApplicationData))))
+	if (!ReplaceTargetItems(std::move(rSubject),
+	        std::make_shared<const VSubjectApplicationData>(std::move(rApplicationData)), NewIdentities()))
 		return NVX::Status::c_Failure;
 	m_TargetExtras = std::move(extras);
 	m_SourceName = std::move(sourceName);
 	m_SavedTarget = TargetValues();
+	emit unsavedChangesChanged();
 	return NVX::Status::c_Success;
 }
 
 std::uint32_t VRetargetSetup::SaveTargetSubject(const boost::filesystem::path& i_rPath)
 {
+	std::string reason;
+	return Save(i_rPath, reason);
+}
+
+std::uint32_t VRetargetSetup::Save(const boost::filesystem::path& i_rPath, std::string& o_rReason)
+{
 	const VSubjectValues target = TargetValues();
 	if (!target.m_pParametrised || !target.m_pApplicationData)
 		return NVX::Status::c_NothingToActOn;
 	TellNamesUsedTwice(*target.m_pParametrised);
-	if (!ReadsBack({*target.m_pParametrised, *target.m_pApplicationData}, m_TargetExtras))
+	if (!ReadsBack({*target.m_pParametrised, *target.m_pApplicationData}, m_TargetExtras, o_rReason))
 		return NVX::Status::c_WriteFailure;
+	std::vector<std::string> errors;
 	const std::uint32_t status = CoreOrlexQRTIO::VWriter().Write(i_rPath, *target.m_pParametrised,
-	    *target.m_pApplicationData, m_TargetExtras, CoreOrlexQRTIO::c_AutomaticVersion);
+	    *target.m_pApplicationData, m_TargetExtras, CoreOrlexQRTIO::c_AutomaticVersion, &errors);
+	for (const std::string& rError : errors)
+	{
+		NVX_LOG("QRTIO", NVX::ELogError, "%1%", rError);
+		o_rReason = rError;
+	}
 	if (status == NVX::Status::c_Success)
+	{
 		m_SavedTarget = target;
+		emit unsavedChangesChanged();
+	}
 	return status;
 }
 
@@ -301,10 +325,13 @@ void VRetargetSetup::SaveTargetSubjectURL(const QUrl& i_rFileURL)
 		return Ignore(c_Command, QString(Ignored::c_LegacyOnlyRead).arg(i_rFileURL.toLocalFile()));
 	if (const auto pApplicationData = TargetValues().m_pApplicationData)
 		TellSourceOfSaved(pApplicationData->m_RetargetSourceTemplate, m_ShownSourceName);
-	switch (SaveTargetSubject(path))
+	std::string reason;
+	switch (Save(path, reason))
 	{
-	case NVX::Status::c_Success: break;
+	case NVX::Status::c_Success: emit targetSubjectSaved(i_rFileURL); break;
 	case NVX::Status::c_NothingToActOn: Ignore(c_Command, Ignored::c_NoTarget); break;
-	default: Ignore(c_Command, QString(Ignored::c_NotSaved).arg(i_rFileURL.toLocalFile())); break;
+	default:
+		Ignore(c_Command, QString(Ignored::c_NotSaved).arg(i_rFileURL.toLocalFile(), QString::fromStdString(reason)));
+		break;
 	}
 }

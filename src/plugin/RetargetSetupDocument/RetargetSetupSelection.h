@@ -45,6 +45,9 @@ public:
 	void SetSelectedTargetSegment(std::int32_t i_Index) { Set(1, i_Index); }
 	void SetSelectedTarget(std::int32_t i_Index) { Set(2, i_Index); }
 
+	/// Takes over the host's selection at once; otherwise it is heard of through the dispatcher.
+	void Update();
+
 signals:
 	void Changed();
 	void countsChanged();
@@ -53,7 +56,6 @@ protected:
 	void OnShared() override;
 
 private:
-	void Update();
 	void Set(std::size_t i_Which, std::int32_t i_Index);
 
 	const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;

@@ -116,8 +116,8 @@ void VRetargetSetup::AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentInde
 		if (sourceMirror != -1 && targetMirror != -1)
 			addPair(std::size_t(sourceMirror), std::size_t(targetMirror));
 	}
-	ReplaceTarget(
-	    c_Command, std::move(subject), std::make_shared<const VSubjectApplicationData>(std::move(applicationData)));
+	ReplaceTarget(c_Command, std::move(subject),
+	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), m_Identities);
 }
 
 void VRetargetSetup::RemoveTarget(int i_TargetIndex)
@@ -130,8 +130,10 @@ void VRetargetSetup::RemoveTarget(int i_TargetIndex)
 	if (std::uint32_t(i_TargetIndex) >= subject.m_Targets.size())
 		return Ignore(c_Command, Ignored::c_NoSelectedTarget);
 	RetargetSetup::RemoveTarget(subject, applicationData, std::uint32_t(i_TargetIndex));
-	ReplaceTarget(
-	    c_Command, std::move(subject), std::make_shared<const VSubjectApplicationData>(std::move(applicationData)));
+	VIdentities identities = m_Identities;
+	identities.m_Targets.erase(identities.m_Targets.begin() + i_TargetIndex);
+	ReplaceTarget(c_Command, std::move(subject),
+	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), std::move(identities));
 }
 
 void VRetargetSetup::UpdateTargets()
@@ -151,7 +153,7 @@ void VRetargetSetup::UpdateTargets()
 		return Ignore(c_Command, Ignored::c_TargetNoTree);
 	VSubjectParametrised subject = *target.m_pParametrised;
 	RetargetSetup::UpdateTargetStates(*pSourceFK, *pTargetFK, *source.m_pParametrised, subject);
-	ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData);
+	ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities);
 }
 
 void VRetargetSetup::CreateAllJoints()
@@ -163,7 +165,7 @@ void VRetargetSetup::CreateAllJoints()
 	VSubjectParametrised subject = *target.m_pParametrised;
 	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
 	RetargetSetup::EnableAllJoints(subject, extras);
-	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData))
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities))
 		m_TargetExtras = std::move(extras);
 }
 
@@ -178,6 +180,6 @@ void VRetargetSetup::RemoveUnnecessaryJoints()
 	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
 	if (const auto pBefore = RetargetSetup::KinematicsInBindPose(*target.m_pParametrised, *target.m_pSubject, "target"))
 		TellChangedPose(*pBefore, subject);
-	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData))
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities))
 		m_TargetExtras = std::move(extras);
 }

@@ -1,5 +1,6 @@
 // What VRetargetSetupWidget does when a parameter, a preference, the document or the selection has changed. Handlers
-// run through the dispatcher, some time after the change, and read what stands then.
+// run through the dispatcher, some time after the change, and read what stands then. What was typed is for the target,
+// the subject or the skeleton that was shown; if another one has taken its place since, it is dropped, which is told.
 
 #include "DebugServices/GlobalLog.h"
 #include "OrlexQtQuick/GuardedCallback.h"
@@ -17,6 +18,7 @@
 #include "UtilsFileSystem/Paths.h"
 
 #include <bit>
+#include <utility>
 
 using CoreOrlexTypes::VSubjectParametrised;
 using OrlexQtQuick::Guarded;
@@ -73,15 +75,26 @@ void VRetargetSetupWidget::ApplyStoredValues()
 
 void VRetargetSetupWidget::ApplyParameters()
 {
+	OnSourceSkeletonChanged();
+	OnTargetFBXChanged();
+	OnTargetRootChanged();
+	ApplyEdits();
+	m_pSelection->Update();
+}
+
+void VRetargetSetupWidget::ApplyEdits()
+{
 	OnTargetScaleChanged();
 	OnTargetParametersChanged();
 }
 
 void VRetargetSetupWidget::OnSourceSkeletonChanged()
 {
-	if (!m_Parameters.m_pSourceSkeleton->HasValue())
+	VChosenSource chosen{m_Parameters.m_pSourceSkeleton->GetValueText(), m_Parameters.m_pSourceSkin->GetValueText()};
+	if (std::exchange(m_ChosenSource, chosen) == chosen || !m_Parameters.m_pSourceSkeleton->HasValue())
 		return;
-	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(m_Parameters.m_pSourceSkeleton->GetValueText());
+	m_UnreadSource.clear();
+	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(chosen.m_Skeleton);
 	const std::string& rShown = m_pRetargetSetup->GetShownSourceName();
 	// A bare name is what a file of a target subject tells; where the process happens to run has nothing to do with it.
 	if (!path.is_absolute())
@@ -91,31 +104,57 @@ void VRetargetSetupWidget::OnSourceSkeletonChanged()
 		return;
 	}
 	RetargetSetup::VPanelParameters::OfferFile(*m_Parameters.m_pSourceSkeleton, path);
-	const VLoadedSource source{
-	    path, RetargetSetup::FileStem(UtilsFileSystem::PathFromUtf8(m_Parameters.m_pSourceSkin->GetValueText()))};
+	const VLoadedSource source{path, RetargetSetup::FileStem(UtilsFileSystem::PathFromUtf8(chosen.m_Skin))};
 	// The document may have been told of another source since, by a target subject's file.
 	if (m_LoadedSource == source && m_pRetargetSetup->GetSourceName() == rShown)
 		return;
 	if (m_pRetargetSetup->LoadSourceSubject(source.m_Path, source.m_SkinName))
+	{
 		m_LoadedSource = source;
+		return UpdateRemarks();
+	}
+	m_UnreadSource = UtilsFileSystem::ToUtf8(path.filename());
+	NVX_LOG(c_LogCategory, NVX::ELogError,
+	    "'%1%' cannot be read as a source skeleton, for the reason told before: still showing %2%",
+	    UtilsFileSystem::ToUtf8(path), rShown.empty() ? "none" : "'" + rShown + "'");
+	UpdateRemarks();
 }
 
 void VRetargetSetupWidget::OnTargetFBXChanged()
 {
 	if (!m_Parameters.m_pTargetFBX->HasValue())
+		return m_ChosenFBX.reset();
+	const std::string text = m_Parameters.m_pTargetFBX->GetValueText();
+	if (std::exchange(m_ChosenFBX, text) == text)
 		return;
-	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(m_Parameters.m_pTargetFBX->GetValueText());
+	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(text);
 	if (!path.is_absolute())
 	{
-		NVX_LOG(c_LogCategory, NVX::ELogWarning, "Target FBX '%1%' is in none of the folders",
-		    UtilsFileSystem::ToUtf8(path));
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "Target FBX '%1%' is in none of the folders", text);
 		return;
 	}
 	RetargetSetup::VPanelParameters::OfferFile(*m_Parameters.m_pTargetFBX, path);
+	m_UnreadFBX.clear();
 	if (!m_pRetargetSetup->LoadTargetFBX(path))
-		return;
+	{
+		m_UnreadFBX = UtilsFileSystem::ToUtf8(path.filename());
+		const bool bSkeleton = m_pRetargetSetup->GetFBXSkeleton() != nullptr;
+		NVX_LOG(c_LogCategory, NVX::ELogError, "'%1%' gives no skeleton: %2%. %3%", text,
+		    m_pRetargetSetup->GetTargetFBXError(),
+		    bSkeleton ? "The one of '" + m_pRetargetSetup->GetTargetName() + "' stays" : "There is none now");
+		if (!bSkeleton)
+			m_Parameters.SetBones({});
+		return UpdateRemarks();
+	}
+	std::uint32_t root = 0;
+	if (m_AgreedRoot && m_Parameters.m_pTargetRoot->Get(root) && root != *m_AgreedRoot)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "The target root that was chosen last is a bone of another FBX file: it is not taken over");
 	m_Parameters.SetBones(RetargetSetup::BoneListForEnum(*m_pRetargetSetup->GetFBXSkeleton()));
 	m_Parameters.m_pTargetRoot->Set(std::uint32_t(0));
+	m_AgreedRoot = 0;
+	m_pRetargetSetup->SetTargetRootIndex(0, false);
+	UpdateRemarks();
 }
 
 void VRetargetSetupWidget::OnTargetRootChanged()
@@ -124,6 +163,9 @@ void VRetargetSetupWidget::OnTargetRootChanged()
 		return;
 	std::uint32_t root = 0;
 	m_Parameters.m_pTargetRoot->Get(root);
+	if (m_AgreedRoot == root)
+		return;
+	m_AgreedRoot = root;
 	m_pRetargetSetup->SetTargetRootIndex(root);
 }
 
@@ -139,24 +181,45 @@ void VRetargetSetupWidget::OnTargetScaleChanged()
 		m_Parameters.m_pTargetScale->Set(m_AgreedScale.value_or(1.0));
 		return;
 	}
+	if (m_AgreedScale && m_pRetargetSetup->TargetSubjectIdentity() != m_ScaledSubject)
+	{
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "The scale %1% was typed for another target subject: it is not taken over", scale);
+		return SyncScaleParameter();
+	}
 	m_AgreedScale = scale;
 	// A subject that has this scale already keeps its dynamic parameters, of which there may be more.
 	if (m_pRetargetSetup->TargetValues().m_pParametrised && IsSame(m_pRetargetSetup->GetTargetScale(), scale))
 		m_pRetargetSetup->SetNextTargetScale(scale);
 	else
 		m_pRetargetSetup->SetTargetScale(scale);
+	// What the document refused must not stay.
+	if (m_pRetargetSetup->TargetValues().m_pParametrised)
+		SyncScaleParameter();
 }
 
 void VRetargetSetupWidget::OnTargetParametersChanged()
 {
-	VShownTarget edited = m_Parameters.ReadTarget(m_ShownTarget.m_Index);
+	const VShownTarget edited = m_Parameters.ReadTarget(m_ShownTarget.m_Index);
 	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
 	if (!pSubject || IsSameText(edited, m_ShownTarget))
 		return;
+	VShownTarget shown = m_ShownTarget;
+	m_ShownTarget.m_Weight = edited.m_Weight;
+	m_ShownTarget.m_State = edited.m_State;
+	if (shown.m_Index != -1)
+	{
+		// Others may have been removed before it.
+		shown.m_Index = m_ShownTarget.m_Index = m_pRetargetSetup->TargetOfIdentity(m_ShownIdentity);
+		if (shown.m_Index == -1)
+		{
+			NVX_LOG(c_LogCategory, NVX::ELogWarning,
+			    "What was typed last was for target '%1%', which is gone: it is dropped", m_ShownName);
+			return OnSelectionChangedShowTarget();
+		}
+	}
 	VSubjectParametrised subject = *pSubject;
-	RetargetSetup::ApplyEdits(subject, m_ShownTarget, edited);
-	edited.m_bStateHidden = m_ShownTarget.m_bStateHidden;
-	m_ShownTarget = std::move(edited);
+	RetargetSetup::ApplyEdits(subject, shown, edited);
 	// What was refused is shown as it is again by the change that follows.
 	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject));
 }
@@ -172,20 +235,52 @@ void VRetargetSetupWidget::OnFolderPreferenceChanged(const std::string& i_rKey)
 
 void VRetargetSetupWidget::OnSetupChanged()
 {
+	OnTargetScaleChanged();
 	SyncScaleParameter();
 	SyncSourceSkeletonParameter();
 	OnSelectionChangedShowTarget();
+	UpdateRemarks();
+}
+
+void VRetargetSetupWidget::UpdateRemarks()
+{
+	QStringList remarks;
+	const auto text = [](const std::string& i_rText) { return QString::fromStdString(i_rText); };
+	if (!m_UnreadSource.empty())
+	{
+		const QString shown = text(m_pRetargetSetup->GetShownSourceName());
+		remarks << tr("%1 cannot be read: %2")
+		               .arg(text(m_UnreadSource),
+		                   shown.isEmpty() ? tr("there is no source yet.") : tr("the source is still %1.").arg(shown));
+	}
+	const QString made = text(m_pRetargetSetup->GetTargetName());
+	if (!m_UnreadFBX.empty())
+		remarks << tr("%1 gives no skeleton: %2. %3")
+		               .arg(text(m_UnreadFBX), text(m_pRetargetSetup->GetTargetFBXError()),
+		                   m_pRetargetSetup->GetFBXSkeleton()
+		                       ? tr("Root and \"Create Target Subject\" are still those of %1.").arg(made)
+		                       : tr("There is nothing to create a target subject from."));
+	const auto pData = m_pRetargetSetup->TargetValues().m_pApplicationData;
+	if (m_UnreadFBX.empty() && pData && m_pRetargetSetup->GetFBXSkeleton() && text(pData->m_Skin) != made)
+		remarks << tr(
+		    "The target subject is of %1. FBX and root above are of %2, for the next \"Create Target Subject\".")
+		               .arg(pData->m_Skin.empty() ? tr("an unknown character") : text(pData->m_Skin), made);
+	const QString joined = remarks.join('\n');
+	if (std::exchange(m_Remarks, joined) != joined)
+		emit remarksChanged();
 }
 
 void VRetargetSetupWidget::SyncScaleParameter()
 {
 	if (!m_pRetargetSetup->TargetValues().m_pParametrised)
 		return;
+	m_ScaledSubject = m_pRetargetSetup->TargetSubjectIdentity();
 	const double scale = m_pRetargetSetup->GetTargetScale();
-	if (m_AgreedScale && IsSame(*m_AgreedScale, scale))
-		return;
-	m_AgreedScale = scale;
-	m_pRetargetSetup->SetNextTargetScale(scale);
+	if (!m_AgreedScale || !IsSame(*m_AgreedScale, scale))
+	{
+		m_AgreedScale = scale;
+		m_pRetargetSetup->SetNextTargetScale(scale);
+	}
 	m_Parameters.m_pTargetScale->Set(scale);
 }
 
@@ -213,15 +308,20 @@ void VRetargetSetupWidget::SyncSourceSkeletonParameter()
 
 void VRetargetSetupWidget::OnSelectionChangedShowTarget()
 {
-	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
+	// What is shown next must not take the place of what was typed and has not been heard of.
+	OnTargetParametersChanged();
+	const VRetargetSetup::VSubjectValues target = m_pRetargetSetup->TargetValues();
 	VShownTarget shown;
-	if (pSubject)
-		shown = RetargetSetup::ShowTarget(*pSubject, m_pSelection->SelectedTarget());
+	if (target.m_pParametrised)
+		shown = RetargetSetup::ShowTarget(*target.m_pParametrised, m_pSelection->SelectedTarget());
+	m_ShownIdentity = m_pRetargetSetup->TargetIdentity(shown.m_Index);
 	if (shown.m_Index == -1)
 	{
 		m_ShownTarget.m_Index = -1;
 		return;
 	}
+	const auto& rNames = target.m_pApplicationData->m_Targets;
+	m_ShownName = std::size_t(shown.m_Index) < rNames.size() ? rNames[std::size_t(shown.m_Index)].m_Name : "";
 	m_ShownTarget = shown;
 	m_Parameters.WriteTarget(shown);
 }

@@ -13,6 +13,7 @@
 #include "UtilsFileSystem/InstalledProducts.h"
 #include "UtilsFileSystem/Paths.h"
 
+#include <QFileInfo>
 #include <QQuickItem>
 #include <QVBoxLayout>
 
@@ -88,6 +89,11 @@ VRetargetSetupWidget::~VRetargetSetupWidget()
 void VRetargetSetupWidget::FindScene()
 {
 	m_pSceneItem = rootObject() ? rootObject()->findChild<OrlexGraphics::VSceneFramebufferObject*>() : nullptr;
+}
+
+bool VRetargetSetupWidget::IsThere(const QUrl& i_rFileURL) const
+{
+	return QFileInfo::exists(i_rFileURL.toLocalFile());
 }
 
 QSize VRetargetSetupWidget::minimumSizeHint() const

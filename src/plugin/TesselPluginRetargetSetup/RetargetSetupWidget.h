@@ -5,9 +5,12 @@
 #include "TesselPluginRetargetSetup/PanelParameters.h"
 
 #include <QPointer>
+#include <QString>
+#include <QUrl>
 
 #include <memory>
 #include <optional>
+#include <string>
 #include <vector>
 
 class VRetargetSetup;
@@ -34,6 +37,8 @@ class IDispatcher;
 class VRetargetSetupWidget : public OrlexQtQuick::VQuickWidget, public ITesselExecuteCommand
 {
 	Q_OBJECT
+	/// Where what the parameters show is not what is there, a line for each; empty where all is so.
+	Q_PROPERTY(QString remarks READ Remarks NOTIFY remarksChanged)
 
 public:
 	/// No service may be null but the application, of which nothing is asked.
@@ -50,12 +55,24 @@ public:
 
 	bool ExecuteCommand(const std::string& i_rCommand) override;
 
-	/// Brings to the document at once the scale and the target's values that stand in the parameters; otherwise it
-	/// hears of it through the dispatcher.
+	/// Brings to the document at once what stands in the parameters, and takes over the host's selection; otherwise
+	/// both are heard of through the dispatcher, some time later. A command acts on what the operator sees.
 	Q_INVOKABLE void ApplyParameters();
+
+	/// The same for what is of the present target subject: its scale and the target that is shown. Files that were
+	/// chosen are for what comes next.
+	Q_INVOKABLE void ApplyEdits();
+
+	/// Whether a file stands there, or anything else of that name.
+	Q_INVOKABLE bool IsThere(const QUrl& i_rFileURL) const;
 
 	/// Below it something of the panel would be cut off.
 	QSize minimumSizeHint() const override;
+
+	const QString& Remarks() const { return m_Remarks; }
+
+signals:
+	void remarksChanged();
 
 private:
 	/// Where the mouse and the keys move the camera and the manipulator.
@@ -75,8 +92,18 @@ private:
 	void OnFolderPreferenceChanged(const std::string& i_rKey);
 	void OnSetupChanged();
 	void OnSelectionChangedShowTarget();
+	void UpdateRemarks();
 	void SyncScaleParameter();
 	void SyncSourceSkeletonParameter();
+
+	/// What was last heard of the parameters of the source subject, as they are written.
+	struct VChosenSource
+	{
+		std::string m_Skeleton;
+		std::string m_Skin;
+
+		bool operator==(const VChosenSource&) const = default;
+	};
 
 	/// A file that the source subject was made of.
 	struct VLoadedSource
@@ -106,6 +133,18 @@ private:
 	/// Nobody else has given the skin cache folders.
 	const bool m_bOwnSkinFolders;
 	RetargetSetup::VShownTarget m_ShownTarget;
+	/// The document's number for it, and its name.
+	std::uint64_t m_ShownIdentity = 0;
+	std::string m_ShownName;
 	std::optional<double> m_AgreedScale;
+	/// The target subject that the agreed scale is of.
+	std::uint64_t m_ScaledSubject = 0;
+	std::optional<std::uint32_t> m_AgreedRoot;
+	std::optional<std::string> m_ChosenFBX;
+	/// The names of the chosen files that could not be read; empty for those that could.
+	std::string m_UnreadSource;
+	std::string m_UnreadFBX;
+	QString m_Remarks;
+	std::optional<VChosenSource> m_ChosenSource;
 	std::optional<VLoadedSource> m_LoadedSource;
 };

@@ -48,31 +48,62 @@ Rectangle {
 	}
 
 	function addTarget(positionTarget) {
-		ContextRetargetSetup.AddTarget(RetargetSetupSelection.selectedSourceSegment,
-			RetargetSetupSelection.selectedTargetSegment, positionTarget, targetSymmetry.checked)
+		run(() => ContextRetargetSetup.AddTarget(RetargetSetupSelection.selectedSourceSegment,
+			RetargetSetupSelection.selectedTargetSegment, positionTarget, targetSymmetry.checked))
 	}
 
 	function isLegacy(url) {
 		return url.toString().endsWith(".qrx")
 	}
 
-	// What stands in a field that is still being typed into is part of what is saved.
+	// A command acts on what the operator sees: on what stands in a field that is still being typed into, and on what
+	// was set and selected just before.
+	function run(command) {
+		commitField()
+		command()
+	}
+
 	function commitField() {
+		finishField()
+		contextQuickWidget.ApplyParameters()
+	}
+
+	// What is unsaved is then told with what is being typed.
+	function commitEdits() {
+		finishField()
+		contextQuickWidget.ApplyEdits()
+	}
+
+	function finishField() {
 		const field = retargetSetup.Window.activeFocusItem
 		if (field && field.editingFinished !== undefined) {
 			retargetSetup.forceActiveFocus()
 			field.forceActiveFocus()
 		}
-		contextQuickWidget.ApplyParameters()
 	}
 
 	// Legacy files are only read: what came from one is saved under a new name.
 	function save() {
-		commitField()
 		if (isLegacy(currentTargetSubjectURL))
 			saveDialog.open()
 		else
-			ContextRetargetSetup.SaveTargetSubjectURL(currentTargetSubjectURL)
+			saveTo(currentTargetSubjectURL)
+	}
+
+	function saveTo(url) {
+		run(() => ContextRetargetSetup.SaveTargetSubjectURL(url))
+	}
+
+	// A file of another extension is one that "Load" does not show. The dialog has only asked about the name that was
+	// typed.
+	function saveAs(url) {
+		if (/\.qr[rx]$/i.test(url))
+			return saveTo(url)
+		const whole = url + ".qrr"
+		if (!contextQuickWidget.IsThere(whole))
+			return saveTo(whole)
+		replaceDialog.url = whole
+		replaceDialog.open()
 	}
 
 	Connections {
@@ -80,6 +111,13 @@ Rectangle {
 		// Of whatever asked for it; a file that could not be loaded is never what "Save" overwrites.
 		function onTargetSubjectLoaded(url) {
 			retargetSetup.currentTargetSubjectURL = url
+		}
+		function onTargetSubjectSaved(url) {
+			retargetSetup.currentTargetSubjectURL = url
+		}
+		// Otherwise the next "Save" would put one character in the place of another.
+		function onTargetSubjectCreated() {
+			retargetSetup.currentTargetSubjectURL = null
 		}
 		function onCommandIgnored(command, reason) {
 			status.told = reason
@@ -122,7 +160,7 @@ Rectangle {
 		nameFilters: ["Subject files (*.qrr)", "Legacy subject files (*.qrx)"]
 		onAccepted: {
 			if (fileUrls.length === 1)
-				ContextRetargetSetup.LoadTargetSubjectURL(fileUrls[0])
+				retargetSetup.run(() => ContextRetargetSetup.LoadTargetSubjectURL(fileUrls[0]))
 		}
 	}
 	OrlexFileDialog {
@@ -134,14 +172,22 @@ Rectangle {
 		selectExisting: false
 		defaultSuffix: "qrr"
 		onAccepted: {
-			if (fileUrls.length !== 1)
-				return
-			const url = fileUrls[0]
-			retargetSetup.commitField()
-			ContextRetargetSetup.SaveTargetSubjectURL(url)
-			if (!retargetSetup.isLegacy(url))
-				retargetSetup.currentTargetSubjectURL = url
+			if (fileUrls.length === 1)
+				retargetSetup.saveAs(fileUrls[0].toString())
 		}
+	}
+
+	MessageDialog {
+		id: replaceDialog
+
+		property string url: ""
+
+		objectName: "replaceDialog"
+		title: "Save As"
+		icon: StandardIcon.Warning
+		text: Tessel.fileName(url) + " is there already. Do you want to replace it?"
+		standardButtons: StandardButton.Yes | StandardButton.No
+		onYes: retargetSetup.saveTo(url)
 	}
 
 	OrlexSplitView {
@@ -186,11 +232,36 @@ Rectangle {
 					model: retargetSetup.subjectParametersModel
 				}
 
-				OrlexLabel {
-					objectName: "currentFile"
+				Text {
+					objectName: "remarks"
 					Layout.fillWidth: true
-					text: "Current file: " + (retargetSetup.currentTargetSubjectURL
-						? Tessel.fileName(retargetSetup.currentTargetSubjectURL) : "*None*")
+					Layout.preferredWidth: 0
+					visible: text !== ""
+					text: contextQuickWidget.remarks
+					textFormat: Text.PlainText
+					wrapMode: Text.Wrap
+					font.pixelSize: Theme.fontSize
+					color: Theme.warning
+					Accessible.role: Accessible.AlertMessage
+					Accessible.name: text
+				}
+
+				RowLayout {
+					spacing: Theme.spacing
+
+					OrlexLabel {
+						objectName: "currentFile"
+						Layout.fillWidth: true
+						text: "Current file: " + (retargetSetup.currentTargetSubjectURL
+							? Tessel.fileName(retargetSetup.currentTargetSubjectURL) : "*None*")
+					}
+					OrlexLabel {
+						objectName: "unsavedMark"
+						visible: ContextRetargetSetup.unsavedChanges
+						text: "\u25cf not saved"
+						color: Theme.warning
+						toolTip: "The target subject has changes that are in no file"
+					}
 				}
 
 				RowLayout {
@@ -202,7 +273,7 @@ Rectangle {
 						Layout.fillWidth: true
 						text: "Create Target Subject"
 						toolTip: "Create a retarget skeleton for the selected FBX"
-						onClicked: ContextRetargetSetup.CreateTargetSubject()
+						onClicked: retargetSetup.run(() => ContextRetargetSetup.CreateTargetSubject())
 					}
 					OrlexButton {
 						objectName: "load"
@@ -235,14 +306,14 @@ Rectangle {
 						Layout.fillWidth: true
 						text: "Create all joints"
 						toolTip: "Add a joint to every segment in the retarget skeleton"
-						onClicked: ContextRetargetSetup.CreateAllJoints()
+						onClicked: retargetSetup.run(() => ContextRetargetSetup.CreateAllJoints())
 					}
 					OrlexButton {
 						objectName: "removeUnnecessaryJoints"
 						Layout.fillWidth: true
 						text: "Remove unnecessary joints"
 						toolTip: "Remove joints from segments with no targets on themselves or their children"
-						onClicked: ContextRetargetSetup.RemoveUnnecessaryJoints()
+						onClicked: retargetSetup.run(() => ContextRetargetSetup.RemoveUnnecessaryJoints())
 					}
 					PropertyCheckBox {
 						id: jointSymmetry
@@ -291,7 +362,7 @@ Rectangle {
 					Layout.fillWidth: true
 					text: "Update targets"
 					toolTip: "Recalculate offsets to each target based on the current pose"
-					onClicked: ContextRetargetSetup.UpdateTargets()
+					onClicked: retargetSetup.run(() => ContextRetargetSetup.UpdateTargets())
 				}
 
 				RetargetSetupTargetTable {
@@ -314,7 +385,7 @@ Rectangle {
 					toolTip: "Delete the selected target"
 					enabled: RetargetSetupSelection.selectedTarget !== -1
 					readonly property string disabledReason: retargetSetup.targetReason
-					onClicked: ContextRetargetSetup.RemoveTarget(RetargetSetupSelection.selectedTarget)
+					onClicked: retargetSetup.run(() => ContextRetargetSetup.RemoveTarget(RetargetSetupSelection.selectedTarget))
 				}
 
 				ParameterView {
