@@ -14,6 +14,7 @@ TesselPluginInterface::VHostRules VApplicationObject::Rules() const
 {
 	TesselPluginInterface::VHostRules rules;
 	rules.m_bNamespacesAreDetails = true;
+	rules.m_bEachPairOnce = true;
 	return rules;
 }
 

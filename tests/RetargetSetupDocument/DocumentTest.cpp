@@ -350,7 +350,7 @@ TEST_F(Document, AManyStepDragKeepsOneFrameAlive)
 /// A host that is asked before work is lost.
 struct VAskedHost : TesselPluginInterface::IHostRules
 {
-	TesselPluginInterface::VHostRules Rules() const override { return {}; }
+	TesselPluginInterface::VHostRules Rules() const override { return m_Rules; }
 	bool MayReplaceTargetSubject(const std::string& i_rAction) override
 	{
 		m_Asked += i_rAction + ";";
@@ -358,6 +358,7 @@ struct VAskedHost : TesselPluginInterface::IHostRules
 		return m_bAnswer;
 	}
 
+	TesselPluginInterface::VHostRules m_Rules;
 	std::string m_Asked;
 	bool m_bAnswer = false;
 	std::function<void()> m_Meanwhile = [] {};
@@ -411,6 +412,37 @@ TEST_F(Document, AsksItsHostBeforeUnsavedChangesAreReplaced)
 		EXPECT_EQ(pHost->m_Asked, rRow.m_pAsked);
 		EXPECT_EQ(m_Document.TargetValues().m_pParametrised != pBefore, rRow.m_bReplaced);
 	}
+}
+
+TEST_F(Document, AHostMayWantEachPairOnce)
+{
+	SetSmallSubjects();
+	std::string told;
+	QObject::connect(&m_Document, &VRetargetSetup::targetFound,
+	    [&](int i_Index) { told += "found " + std::to_string(i_Index) + ";"; });
+	QObject::connect(&m_Document, &VRetargetSetup::commandIgnored,
+	    [&](const QString&, const QString& i_rReason) { told += i_rReason.toStdString(); });
+	const auto add = [&](int i_Segment, bool i_bPosition, bool i_bSymmetry)
+	{
+		told.clear();
+		m_Document.AddTarget(i_Segment, i_Segment, i_bPosition, i_bSymmetry);
+		return Target().m_Targets.size();
+	};
+	EXPECT_EQ(add(0, true, false), 1u);
+	EXPECT_EQ(add(0, true, false), 2u) << "the plain form";
+	const auto pHost = std::make_shared<VAskedHost>();
+	pHost->m_Rules.m_bEachPairOnce = true;
+	m_Document.SetHostRules(pHost);
+	EXPECT_EQ(add(0, true, false), 2u);
+	EXPECT_EQ(told, "There is a target 'Hips>pelvis' already.found 0;");
+	EXPECT_EQ(add(0, false, false), 3u) << "of another kind";
+	EXPECT_EQ(add(1, true, false), 4u);
+	VLogRecorder log;
+	EXPECT_EQ(add(1, true, true), 5u);
+	EXPECT_EQ(told, "");
+	EXPECT_EQ(log.Take(), "3 RetargetSetup: There is a target 'LeftArm>arm_l' already: only the other side is added");
+	EXPECT_EQ(add(2, true, true), 5u) << "both sides are there";
+	EXPECT_EQ(told, "There is a target 'RightArm>arm_r' already.found 4;");
 }
 
 } // namespace

@@ -325,11 +325,19 @@ TEST_F(Handlers, AFileThatGivesNothingIsToldWhileItIsChosen)
 	}
 	EXPECT_EQ(Property("remarks", "text").toString(), "");
 	m_pDocument->CreateTargetSubject();
+	m_pDocument->SetTargetScale(0.5);
+	Run();
 	Parameter("TargetFBX").SetValue(ToVariant(std::string(RETARGET_TEST_DATA "/fbx/heaps_biped_zup_a7100.fbx")));
 	Run();
+	TakeLog();
 	EXPECT_EQ(m_pWidget->Remarks().toStdString(),
 	    "The target subject is of character. FBX and root above are of heaps_biped_zup_a7100, for the next \"Create "
 	    "Target Subject\".");
+	m_pDocument->CreateTargetSubject();
+	EXPECT_NE(TakeLog().find("'heaps_biped_zup_a7100' is made with the scale 0.5, which was that of 'character'"),
+	    std::string::npos);
+	Run();
+	EXPECT_EQ(m_pWidget->Remarks().toStdString(), "");
 }
 
 TEST_F(Handlers, SourcesAreNeverLookedForWhereTheProcessRuns)

@@ -388,6 +388,13 @@ TEST_F(Panel, ACommandActsOnWhatIsSeen)
 	EXPECT_EQ(state(1), last);
 	for (const auto& rTarget : Target().m_Targets)
 		EXPECT_EQ(rTarget.m_StateExpressions[0].find("79"), std::string::npos) << "it went with its target";
+	emit m_pDocument->targetFound(1);
+	Run();
+	EXPECT_EQ(m_pSelection->SelectedTarget(), 1);
+	EXPECT_EQ(m_pSelection->SelectedTargetSegment(), 6) << "segments stay selected";
+	Click("createTargetSubject");
+	EXPECT_EQ(m_pSelection->SelectedTargetSegment(), -1) << "of the character before";
+	EXPECT_EQ(m_pSelection->SelectedSourceSegment(), 6);
 }
 
 TEST_F(Panel, ListsStayWhereTheyWereScrolledTo)

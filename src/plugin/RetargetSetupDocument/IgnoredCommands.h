@@ -15,6 +15,8 @@ inline constexpr const char* c_SourceNoTree = "The segments of the source subjec
 inline constexpr const char* c_TargetNoTree = "The segments of the target subject make no tree with joints.";
 inline constexpr const char* c_HostRefused = "The host took no item for the change, so everything stays as it was.";
 inline constexpr const char* c_TargetKept = "The target subject has changes that are not saved, and stays.";
+/// The target's name is %1.
+inline constexpr const char* c_PairIsThere = "There is a target '%1' already.";
 /// The rest take the file or URL as %1.
 inline constexpr const char* c_NotLocal = "'%1' is no file on this computer.";
 inline constexpr const char* c_NotOpened = "'%1' cannot be opened. The target subject is still the one before.";

@@ -95,7 +95,8 @@ void VRetargetSetup::SetTargetScale(double i_Scale)
 	if (const std::string lost = dropped.empty() ? "" : RetargetSetup::LostParameters(*pOld); !lost.empty())
 	{
 		NVX_LOG(c_LogCategory, NVX::ELogWarning,
-		    "The scale stays: another one takes the place of the dynamic parameters '%1%', which the target subject needs",
+		    "The scale stays: another one takes the place of the dynamic parameters '%1%', which the target subject "
+		    "needs",
 		    lost);
 		return;
 	}

@@ -67,7 +67,8 @@ public:
 	Q_INVOKABLE void SaveTargetSubjectURL(const QUrl& i_rFileURL);
 
 	/// Ties a target segment to a source segment by the offset that they have in their bind poses: to its origin, or to
-	/// its orientation. With symmetry the pair on the other side is tied too, if both sides have one.
+	/// its orientation. With symmetry the pair on the other side is tied too, if both sides have one. Where the host
+	/// wants each pair once, a target that is there already is told by targetFound.
 	Q_INVOKABLE void AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry);
 	Q_INVOKABLE void RemoveTarget(int i_TargetIndex);
 
@@ -200,6 +201,9 @@ signals:
 
 	/// After CreateTargetSubject.
 	void targetSubjectCreated();
+
+	/// AddTarget has found the target that it was to add.
+	void targetFound(int i_TargetIndex);
 
 	/// A command has ended with no change.
 	/// @param i_rCommand the name of the invokable.

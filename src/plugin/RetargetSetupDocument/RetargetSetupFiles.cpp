@@ -177,6 +177,10 @@ void VRetargetSetup::CreateTargetSubject()
 	if (!bRootChosen)
 		TellOtherRoots(*pSkeleton);
 	TellTwiceTurnedRoot(rRootBone);
+	if (const auto pBefore = TargetValues().m_pApplicationData;
+	    pBefore && pBefore->m_Skin != m_TargetName && m_TargetScale != 1.0)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "'%1%' is made with the scale %2%, which was that of '%3%'",
+		    m_TargetName, m_TargetScale, pBefore->m_Skin);
 
 	const std::optional<Rotation::VVector3> rotation = RetargetSetup::RotationOf(world);
 	if (!rotation)

@@ -24,6 +24,13 @@ void VRetargetSetupSelection::OnShared()
 	m_pSelectionManager->Selection().ChangedSignal().Connect(WeakBind(&VRetargetSetupSelection::Update), m_pDispatcher);
 }
 
+void VRetargetSetupSelection::SelectTarget(int i_Index)
+{
+	TesselPluginInterface::ISelection& rSelection = m_pSelectionManager->Selection();
+	rSelection.Remove(rSelection.ItemsOfKind(NVX::ESelectionTarget));
+	rSelection.Add({{NVX::ESelectionTarget, RetargetSetup::c_SubjectId, std::uint32_t(i_Index), {}}});
+}
+
 void VRetargetSetupSelection::Update()
 {
 	const TesselPluginInterface::ISelection& rSelection = m_pSelectionManager->Selection();

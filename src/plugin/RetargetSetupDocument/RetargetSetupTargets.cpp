@@ -99,8 +99,15 @@ void VRetargetSetup::AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentInde
 
 	VSubjectParametrised subject = *target.m_pParametrised;
 	VSubjectApplicationData applicationData = *target.m_pApplicationData;
+	const bool bOnce = HostRules().m_bEachPairOnce;
+	std::vector<std::int32_t> found;
 	const auto addPair = [&](std::size_t i_Source, std::size_t i_Target)
 	{
+		const std::int32_t there = bOnce ? RetargetSetup::FindTargetPair(*target.m_pParametrised,
+		                               source.m_pParametrised->m_Segments[i_Source].m_Name, i_Target, i_bPosition)
+		                                 : -1;
+		if (there != -1)
+			return found.push_back(there);
 		RetargetSetup::AddTargetPair(
 		    *pSourceFK, *pTargetFK, i_Source, i_Target, i_bPosition, *source.m_pParametrised, subject, applicationData);
 	};
@@ -116,6 +123,20 @@ void VRetargetSetup::AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentInde
 		if (sourceMirror != -1 && targetMirror != -1)
 			addPair(std::size_t(sourceMirror), std::size_t(targetMirror));
 	}
+	const auto nameOf = [&applicationData](std::int32_t i_Index) -> std::string
+	{
+		const auto& rTargets = applicationData.m_Targets;
+		return std::size_t(i_Index) < rTargets.size() ? rTargets[std::size_t(i_Index)].m_Name : "";
+	};
+	if (subject.m_Targets.size() == target.m_pParametrised->m_Targets.size())
+	{
+		Ignore(c_Command, QString(Ignored::c_PairIsThere).arg(QString::fromStdString(nameOf(found.front()))));
+		emit targetFound(found.front());
+		return;
+	}
+	for (const std::int32_t index : found)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "There is a target '%1%' already: only the other side is added",
+		    nameOf(index));
 	ReplaceTarget(c_Command, std::move(subject),
 	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), m_Identities);
 }

@@ -63,6 +63,20 @@ const std::string* TargetSegmentName(const VSubjectParametrised& i_rSubject, con
 	return FirstName(i_rTarget.m_SegmentIndices, i_rSubject.m_Segments);
 }
 
+std::int32_t FindTargetPair(const VSubjectParametrised& i_rSubject, const std::string& i_rSourceName,
+    std::size_t i_TargetSegmentIndex, bool i_bPosition)
+{
+	const auto type = i_bPosition ? VTarget::ELocalPointToWorldPoint : VTarget::ELocalRotationToWorldRotation;
+	const auto isPair = [&](const VTarget& i_rTarget)
+	{
+		const std::string* const pSource = SourceName(i_rSubject, i_rTarget);
+		return i_rTarget.m_Type == type && pSource && *pSource == i_rSourceName && !i_rTarget.m_SegmentIndices.empty()
+		    && i_rTarget.m_SegmentIndices.front() == i_TargetSegmentIndex;
+	};
+	const auto found = std::find_if(i_rSubject.m_Targets.begin(), i_rSubject.m_Targets.end(), isPair);
+	return found == i_rSubject.m_Targets.end() ? -1 : std::int32_t(found - i_rSubject.m_Targets.begin());
+}
+
 std::uint32_t FindOrAddMarker(
     VSubjectParametrised& io_rSubject, VSubjectApplicationData& io_rApplicationData, const std::string& i_rName)
 {

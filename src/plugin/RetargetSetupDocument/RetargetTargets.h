@@ -29,6 +29,11 @@ const std::string* SourceName(const CoreOrlexTypes::VSubjectParametrised& i_rSub
 const std::string* TargetSegmentName(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
     const CoreOrlexTypes::VSubjectParametrised::VTarget& i_rTarget);
 
+/// The first position or rotation target that ties the target segment to a source segment of this name, -1 if none
+/// does.
+std::int32_t FindTargetPair(const CoreOrlexTypes::VSubjectParametrised& i_rSubject, const std::string& i_rSourceName,
+    std::size_t i_TargetSegmentIndex, bool i_bPosition);
+
 /// Appends one target that ties the target segment to the source segment, with the offset that the two have in the
 /// present poses. Both kinematics must have the segments of their subjects, and the indices be in range.
 /// Tells if the subject has no dynamic parameter to store the offset with.

@@ -10,9 +10,10 @@
 namespace RetargetSetup
 {
 
-void DropStaleItems(const VRetargetSetup& i_rDocument, TesselPluginInterface::ISelectionManager& io_rManager)
+void DropStaleItems(const VRetargetSetup& i_rDocument, TesselPluginInterface::ISelectionManager& io_rManager,
+    const VReplacedSubjects& i_rReplaced)
 {
-	const auto isStale = [&i_rDocument](const NVX::ISelectionItem& i_rItem)
+	const auto isStale = [&](const NVX::ISelectionItem& i_rItem)
 	{
 		const auto beyond = [&i_rItem](const QAbstractItemModel& i_rList)
 		{ return i_rItem.m_ElementIndex >= std::uint32_t(i_rList.rowCount()); };
@@ -20,9 +21,9 @@ void DropStaleItems(const VRetargetSetup& i_rDocument, TesselPluginInterface::IS
 			return false;
 		switch (i_rItem.m_Kind)
 		{
-		case NVX::ESelectionSourceSegment: return beyond(*i_rDocument.GetSourceSegmentModel());
-		case NVX::ESelectionTargetSegment: return beyond(*i_rDocument.GetTargetSegmentModel());
-		case NVX::ESelectionTarget: return beyond(*i_rDocument.GetTargetModel());
+		case NVX::ESelectionSourceSegment: return i_rReplaced.m_bSource || beyond(*i_rDocument.GetSourceSegmentModel());
+		case NVX::ESelectionTargetSegment: return i_rReplaced.m_bTarget || beyond(*i_rDocument.GetTargetSegmentModel());
+		case NVX::ESelectionTarget: return i_rReplaced.m_bTarget || beyond(*i_rDocument.GetTargetModel());
 		default: return false;
 		}
 	};

@@ -108,8 +108,14 @@ void VRetargetSetupWidget::OnSourceSkeletonChanged()
 	// The document may have been told of another source since, by a target subject's file.
 	if (m_LoadedSource == source && m_pRetargetSetup->GetSourceName() == rShown)
 		return;
+	const std::optional<VLoadedSource> before = m_LoadedSource;
 	if (m_pRetargetSetup->LoadSourceSubject(source.m_Path, source.m_SkinName))
 	{
+		if (before && before->m_Path != source.m_Path && !source.m_SkinName.empty()
+		    && before->m_SkinName == source.m_SkinName)
+			NVX_LOG(c_LogCategory, NVX::ELogWarning,
+			    "The skin '%1%' was chosen for source '%2%', and '%3%' wears it now", source.m_SkinName,
+			    RetargetSetup::FileStem(before->m_Path), RetargetSetup::FileStem(source.m_Path));
 		m_LoadedSource = source;
 		return UpdateRemarks();
 	}

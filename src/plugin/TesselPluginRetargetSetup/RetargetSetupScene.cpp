@@ -11,6 +11,8 @@
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "TesselPluginRetargetSetup/ManipulatorMove.h"
 
+#include <utility>
+
 using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectParametrised;
 using NVX::ISelectionItem;
@@ -82,7 +84,11 @@ void VRetargetSetupScene::OnShared()
 
 void VRetargetSetupScene::OnSetupChanged()
 {
-	RetargetSetup::DropStaleItems(*m_pRetargetSetup, *SelectionManager());
+	const std::uint64_t subject = m_pRetargetSetup->TargetSubjectIdentity();
+	const std::string& rSource = m_pRetargetSetup->GetShownSourceName();
+	// What was selected of one character is nothing of the next.
+	RetargetSetup::DropStaleItems(*m_pRetargetSetup, *SelectionManager(),
+	    {std::exchange(m_SelectedSource, rSource) != rSource, std::exchange(m_SelectedSubject, subject) != subject});
 	RefreshScene();
 }
 

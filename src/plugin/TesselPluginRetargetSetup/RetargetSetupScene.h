@@ -10,6 +10,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <string>
 #include <vector>
 
 class VRetargetSetup;
@@ -73,6 +74,9 @@ private:
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
 	/// Makes what is shown of the document's frames.
 	std::shared_ptr<Flow2Graphics::VFlowSubjectSceneTransform> m_pSubjectTransform;
+	/// What the selection is of.
+	std::string m_SelectedSource;
+	std::uint64_t m_SelectedSubject = 0;
 	bool m_bConnected = false;
 	/// -1 while the manipulator is hidden.
 	std::int64_t m_ManipulatedSegment = -1;

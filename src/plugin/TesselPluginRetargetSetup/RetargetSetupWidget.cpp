@@ -74,6 +74,8 @@ VRetargetSetupWidget::VRetargetSetupWidget(std::shared_ptr<TesselPluginInterface
 
 	connect(m_pSelection.get(), &VRetargetSetupSelection::Changed, this,
 	    &VRetargetSetupWidget::OnSelectionChangedShowTarget);
+	connect(m_pRetargetSetup.get(), &VRetargetSetup::targetFound, m_pSelection.get(),
+	    &VRetargetSetupSelection::SelectTarget);
 	m_pRetargetSetup->GetChangedSignal().Connect(Guarded(this, &VRetargetSetupWidget::OnSetupChanged), m_pDispatcher);
 	ApplyStoredValues();
 }

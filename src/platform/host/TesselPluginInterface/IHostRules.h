@@ -20,6 +20,8 @@ struct VHostRules
 	/// The attributes xmlns:* and xsi:* of a skeleton file, which every file that was written here has, are told as
 	/// details, not as warnings.
 	bool m_bNamespacesAreDetails = false;
+	/// A pair of segments that has a target of a kind gets no second one of that kind.
+	bool m_bEachPairOnce = false;
 };
 
 /// What a host may give beyond the services that every host gives: the application object of such a host implements
