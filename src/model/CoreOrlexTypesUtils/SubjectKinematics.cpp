@@ -15,7 +15,7 @@ namespace
 
 using CoreOrlexTypes::VSubject;
 
-bool Fits(const VSubject& i_rSubject, const VSubject::VTarget& i_rTarget,
+bool FitsItsType(const VSubject& i_rSubject, const VSubject::VTarget& i_rTarget,
     const ComputeSubject::ITargetFKFactory<VSubject::VTarget>& i_rFactory, const ComputeSubject::VSegmentTree& i_rTree)
 {
 	try
@@ -73,7 +73,7 @@ VSubjectKinematics::VSubjectKinematics(const VSubject& i_rSubject)
 	{
 		const VSubject::VTarget& rTarget = i_rSubject.m_Targets[i];
 		const auto* const pFactory = ComputeSubject::TargetFKFactory(rTarget.m_Type);
-		keep[i] = pFactory && Fits(i_rSubject, rTarget, *pFactory, tree);
+		keep[i] = pFactory && FitsItsType(i_rSubject, rTarget, *pFactory, tree);
 		if (pFactory && !keep[i])
 			m_Misfits.push_back(i);
 	}
