@@ -1,6 +1,7 @@
 #include "retarget/Commands.h"
 #include "retarget/Documentation.h"
 #include "retarget/Output.h"
+#include "retarget/Parsing.h"
 
 namespace CommandLine
 {
@@ -11,7 +12,7 @@ VCommand AddDocumentationCommand(CLI::App& io_rProgram)
 	    {"documentation man", "documentation bash"});
 	pApp->group("");
 	const auto pForm = std::make_shared<std::string>();
-	pApp->add_option("FORM", *pForm, "man or bash")->required()->check(CLI::IsMember({"man", "bash"}));
+	pApp->add_option("FORM", *pForm, "man or bash")->required()->check(OneOf({"man", "bash"}));
 	return {pApp,
 	    [pForm]
 	    {

@@ -2,6 +2,7 @@
 
 #include "retarget/ExitStatus.h"
 #include "retarget/Messages.h"
+#include "retarget/Suggest.h"
 
 #include "CoreOrlexTypes/JointType.h"
 #include "DebugServices/GlobalLog.h"
@@ -11,6 +12,9 @@
 #include "math/NumberText.h"
 
 #include <algorithm>
+#include <fstream>
+#include <iostream>
+#include <iterator>
 
 namespace CommandLine
 {
@@ -244,6 +248,8 @@ void UpdateTargets(VSession& io_rSession, const std::string&)
 	io_rSession.Document().UpdateTargets();
 }
 
+constexpr const char* c_pEditsGroup = "Edits, run in the order given";
+
 constexpr VEditKind c_Kinds[] = {
     {"--position", "SRC:TGT",
         "Add a position target: a point fixed to the target segment TGT follows the source segment SRC. Segments are "
@@ -279,6 +285,50 @@ constexpr VEditKind c_Kinds[] = {
     {"--update-targets", nullptr, "Measure the offset of every target again in the present bind poses", UpdateTargets},
 };
 
+std::string Trimmed(const std::string& i_rText)
+{
+	constexpr const char* c_Blanks = " \t\r";
+	const std::size_t begin = i_rText.find_first_not_of(c_Blanks);
+	return begin == std::string::npos ? "" : i_rText.substr(begin, i_rText.find_last_not_of(c_Blanks) + 1 - begin);
+}
+
+/// One edit a line, as on the command line but without quotes: what stands behind the option's name is its value,
+/// blanks and all. Empty lines and those that begin with "#" are passed over.
+void ReadEdits(const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
+{
+	std::ifstream file;
+	if (i_rPath != "-")
+		file.open(i_rPath);
+	std::istream& rStream = i_rPath == "-" ? std::cin : file;
+	std::size_t number = 0;
+	for (std::string line; std::getline(rStream, line);)
+	{
+		++number;
+		line = Trimmed(line);
+		if (line.empty() || line[0] == '#')
+			continue;
+		const std::string where = i_rPath + ":" + std::to_string(number) + ": ";
+		const std::size_t split = std::min(line.find_first_of(" \t="), line.size());
+		const std::string name = line.substr(0, split);
+		const std::string value = split == line.size() ? "" : Trimmed(line.substr(split + 1));
+		const auto pKind = std::find_if(std::begin(c_Kinds), std::end(c_Kinds),
+		    [&](const VEditKind& i_rKind) { return name == i_rKind.m_pName && (i_bOfCreate || !i_rKind.m_bOfCreate); });
+		if (pKind == std::end(c_Kinds))
+		{
+			std::vector<std::string> names;
+			for (const VEditKind& rKind : c_Kinds)
+				names.push_back(rKind.m_pName);
+			throw VCommandError(EBadInput, where + "there is no edit \"" + name + "\"" + Meant(name, names));
+		}
+		if (value.empty() == (pKind->m_pValue != nullptr))
+			throw VCommandError(EBadInput,
+			    where + name + (value.empty() ? std::string(" needs a value: ") + pKind->m_pValue : " takes no value"));
+		io_rEdits.push_back({pKind, value, where});
+	}
+	if (number == 0 && !rStream.eof())
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a file of edits");
+}
+
 } // namespace
 
 void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits, bool i_bOfCreate)
@@ -293,7 +343,7 @@ void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits,
 			              .add_option_function<std::string>(
 			                  rKind.m_pName,
 			                  [i_rpEdits, &rKind](const std::string& i_rValue) {
-				                  i_rpEdits->push_back({&rKind, i_rValue});
+				                  i_rpEdits->push_back({&rKind, i_rValue, {}});
 			                  },
 			                  rKind.m_pHelp)
 			              ->option_text(rKind.m_pValue);
@@ -301,19 +351,36 @@ void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits,
 			pOption = io_rApp.add_flag_callback(
 			    rKind.m_pName,
 			    [i_rpEdits, &rKind] {
-				    i_rpEdits->push_back({&rKind, {}});
+				    i_rpEdits->push_back({&rKind, {}, {}});
 			    },
 			    rKind.m_pHelp);
 		// While parsing, so that options of different names keep their order.
-		pOption->trigger_on_parse()->group("Edits, run in the order given");
+		pOption->trigger_on_parse()->group(c_pEditsGroup);
 	}
+	io_rApp
+	    .add_option_function<std::string>(
+	        "--edits",
+	        [i_rpEdits, i_bOfCreate](const std::string& i_rPath) { ReadEdits(i_rPath, i_bOfCreate, *i_rpEdits); },
+	        "Here come the edits of a file: one a line, as --position Hips:Left Hip, without quotes; lines that begin "
+	        "with "
+	        "# are comments; - is standard input")
+	    ->option_text("FILE")
+	    ->trigger_on_parse()
+	    ->group(c_pEditsGroup);
 }
 
 void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
 {
 	for (const VEdit& rEdit : i_rEdits)
 	{
-		rEdit.m_pKind->m_pApply(io_rSession, rEdit.m_Value);
+		try
+		{
+			rEdit.m_pKind->m_pApply(io_rSession, rEdit.m_Value);
+		}
+		catch (const VCommandError& rError)
+		{
+			throw VCommandError(rError.Status(), rEdit.m_Where + rError.what());
+		}
 		io_rSession.Settle();
 	}
 	const std::vector<std::string>& rWithoutPartner = io_rSession.m_WithoutPartner;

@@ -27,6 +27,8 @@ struct VEdit
 {
 	const VEditKind* m_pKind;
 	std::string m_Value;
+	/// Where it stands in a file of edits, as "FILE:LINE: "; empty for one of the command line.
+	std::string m_Where;
 };
 
 /// Edits in the order in which they stand on the line.

@@ -1,6 +1,7 @@
 #include "retarget/Commands.h"
 #include "retarget/Messages.h"
 #include "retarget/Output.h"
+#include "retarget/Parsing.h"
 
 #include "CoreOrlexTypesUtils/StaticExpressionParser.h"
 #include "math/NumberText.h"
@@ -116,7 +117,7 @@ VCommand AddEvalCommand(CLI::App& io_rProgram)
 	        "parameters, "
 	        "but no powers and functions (linear), as the geometry of segments and targets; all of it (full)")
 	    ->option_text("static|linear|full")
-	    ->check(CLI::IsMember({"static", "linear", "full"}));
+	    ->check(OneOf({"static", "linear", "full"}));
 	pApp->add_option_function<std::string>(
 	        "--static",
 	        [pSettings](const std::string& i_rText) { pSettings->m_Static.push_back(SplitName("--static", i_rText)); },

@@ -1,6 +1,7 @@
 #include "retarget/Commands.h"
 #include "retarget/Elements.h"
 #include "retarget/Output.h"
+#include "retarget/Parsing.h"
 #include "retarget/SubjectFile.h"
 
 #include "ComputeSubjectFK/SegmentFKInterfaces.h"
@@ -138,7 +139,7 @@ VCommand AddFkCommand(CLI::App& io_rProgram)
 	    ->required();
 	pApp->add_option("--pose", pSettings->m_Pose, "Which of the poses in the file (default: bind)")
 	    ->option_text("bind|mean|tpose")
-	    ->check(CLI::IsMember({"bind", "mean", "tpose"}));
+	    ->check(OneOf({"bind", "mean", "tpose"}));
 	pApp->add_option("--state", pSettings->m_State,
 	        "A pose of your own: the values of all joints in the order of the segments, radians and mm")
 	    ->option_text("V,V,...");

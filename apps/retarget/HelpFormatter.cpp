@@ -1,21 +1,63 @@
 #include "retarget/HelpFormatter.h"
 
+#include <algorithm>
+#include <sys/ioctl.h>
+#include <unistd.h>
+
 namespace CommandLine
 {
 namespace
 {
 
-constexpr std::size_t c_Width = 100;
-constexpr std::size_t c_Column = 32;
+constexpr std::size_t c_LargestColumn = 32;
 
 std::string Entry(const std::string& i_rName, const std::string& i_rText)
 {
+	const std::size_t width = TextWidth();
+	const std::size_t column = std::min(c_LargestColumn, width / 3);
 	std::string line = "  " + i_rName;
-	line += line.size() < c_Column ? std::string(c_Column - line.size(), ' ') : "\n" + std::string(c_Column, ' ');
-	return line + Wrap(i_rText, c_Width - c_Column, c_Column) + "\n";
+	line += line.size() < column ? std::string(column - line.size(), ' ') : "\n" + std::string(column, ' ');
+	return line + Wrap(i_rText, width - column, column) + "\n";
 }
 
 } // namespace
+
+std::size_t TextWidth()
+{
+	constexpr std::size_t c_Narrowest = 40;
+	constexpr std::size_t c_Widest = 100;
+	winsize size{};
+	if (!isatty(STDOUT_FILENO) || ::ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) != 0 || size.ws_col == 0)
+		return c_Widest;
+	return std::clamp<std::size_t>(size.ws_col, c_Narrowest, c_Widest);
+}
+
+std::string FitLine(const std::string& i_rLine, std::size_t i_Width)
+{
+	if (i_rLine.size() <= i_Width)
+		return i_rLine;
+	const std::size_t indent = i_rLine.find_first_not_of(' ');
+	if (indent == 0)
+		return Wrap(i_rLine, i_Width, 0);
+	// A name and what it means.
+	const std::size_t gap = i_rLine.find("   ", indent);
+	if (gap != std::string::npos)
+		return i_rLine.substr(0, gap) + "\n" + std::string(indent + 4, ' ')
+		    + Wrap(i_rLine.substr(i_rLine.find_first_not_of(' ', gap)), i_Width - indent - 4, indent + 4);
+	// A command, which goes on behind a backslash; not within quotes.
+	std::size_t cut = 0;
+	bool bQuoted = false;
+	for (std::size_t i = indent; i + 2 < i_Width; ++i)
+	{
+		bQuoted ^= i_rLine[i] == '\'';
+		if (i_rLine[i] == ' ' && !bQuoted)
+			cut = i;
+	}
+	if (cut <= indent)
+		return i_rLine;
+	const std::string rest = std::string(6, ' ') + i_rLine.substr(cut + 1);
+	return i_rLine.substr(0, cut) + " \\\n" + (rest.size() < i_rLine.size() ? FitLine(rest, i_Width) : rest);
+}
 
 std::string Wrap(const std::string& i_rText, std::size_t i_Width, std::size_t i_Indent)
 {
@@ -58,7 +100,15 @@ std::string VHelpFormatter::make_help(const CLI::App* i_pApp, std::string i_Name
 	// The library puts blank lines of its own between groups.
 	for (std::size_t at = help.find("\n\n\n"); at != std::string::npos; at = help.find("\n\n\n", at))
 		help.erase(at, 1);
-	return help + "\n" + make_footer(i_pApp);
+	help += '\n';
+	const std::string footer = i_pApp->get_footer();
+	for (std::size_t begin = 0; begin < footer.size();)
+	{
+		const std::size_t end = std::min(footer.find('\n', begin), footer.size());
+		help += FitLine(footer.substr(begin, end - begin), TextWidth()) + "\n";
+		begin = end + 1;
+	}
+	return help;
 }
 
 std::string VHelpFormatter::make_group(
@@ -86,7 +136,7 @@ std::string VHelpFormatter::make_usage(const CLI::App* i_pApp, std::string i_Nam
 
 std::string VHelpFormatter::make_description(const CLI::App* i_pApp) const
 {
-	return Wrap(i_pApp->get_description(), c_Width, 0) + "\n";
+	return Wrap(i_pApp->get_description(), TextWidth(), 0) + "\n";
 }
 
 std::string VHelpFormatter::make_option(const CLI::Option* i_pOption, bool i_bPositional) const

@@ -5,6 +5,13 @@
 namespace CommandLine
 {
 
+/// Columns that help may take: those of the terminal, at most 100.
+std::size_t TextWidth();
+
+/// One line of a footer at a width: text is wrapped, a name and its meaning, three blanks apart, go under each other,
+/// and a command goes on behind a backslash.
+std::string FitLine(const std::string& i_rLine, std::size_t i_Width);
+
 /// Wraps a text at blanks; lines after the first begin with the indent. Line ends in the text stay.
 std::string Wrap(const std::string& i_rText, std::size_t i_Width, std::size_t i_Indent);
 

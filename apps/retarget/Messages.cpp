@@ -8,6 +8,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <mutex>
+#include <string_view>
 #include <unistd.h>
 #include <utility>
 #include <vector>
@@ -146,6 +147,13 @@ const char* LevelName(int i_Level)
 	return LevelOf(i_Level).m_pName;
 }
 
+bool HasColours(int i_Descriptor)
+{
+	const char* const pNoColour = std::getenv("NO_COLOR");
+	const char* const pTerminal = std::getenv("TERM");
+	return isatty(i_Descriptor) && !(pNoColour && *pNoColour) && pTerminal && std::string_view(pTerminal) != "dumb";
+}
+
 std::string OneLine(std::string i_Message)
 {
 	while (!i_Message.empty() && (i_Message.back() == '\n' || i_Message.back() == '\r'))
@@ -158,11 +166,7 @@ std::string OneLine(std::string i_Message)
 
 void PrintMessage(const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)
 {
-	static const bool s_bColour = []
-	{
-		const char* pNoColour = std::getenv("NO_COLOR");
-		return isatty(STDERR_FILENO) && !(pNoColour && *pNoColour);
-	}();
+	static const bool s_bColour = HasColours(STDERR_FILENO);
 	const VLevel& rLevel = LevelOf(i_Level);
 	std::fprintf(stderr, "%s%s%s %s: %s\n", s_bColour ? rLevel.m_pColour : "", rLevel.m_pName,
 	    s_bColour ? "\033[0m" : "", i_rCategory.Name().c_str(), OneLine(i_rMessage).c_str());

@@ -47,6 +47,9 @@ int DefaultLevel(const VMessageSettings& i_rSettings);
 /// "error", "warning", "information" or "detail".
 const char* LevelName(int i_Level);
 
+/// Whether text that goes to this descriptor may have colours: to a terminal that knows them, unless NO_COLOR is set.
+bool HasColours(int i_Descriptor);
+
 /// The message in one line, without what could drive a terminal or pretend to be another message.
 std::string OneLine(std::string i_Message);
 

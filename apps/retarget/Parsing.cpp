@@ -3,6 +3,8 @@
 #include "retarget/ExitStatus.h"
 #include "retarget/Suggest.h"
 
+#include <algorithm>
+
 namespace CommandLine
 {
 namespace
@@ -12,6 +14,15 @@ std::string SeeHelp(const CLI::App& i_rApp)
 {
 	const CLI::App* const pProgram = i_rApp.get_parent();
 	return "see \"" + (pProgram ? pProgram->get_name() + " " : "") + i_rApp.get_name() + " --help\"";
+}
+
+std::string NoCommand(const CLI::App& i_rProgram, const std::string& i_rWord)
+{
+	std::vector<std::string> names;
+	for (const CLI::App* pCommand :
+	    i_rProgram.get_subcommands([](const CLI::App* i_pApp) { return !i_pApp->get_group().empty(); }))
+		names.push_back(pCommand->get_name());
+	return "there is no command \"" + i_rWord + "\"" + Meant(i_rWord, names) + "; " + SeeHelp(i_rProgram);
 }
 
 /// The first word of the line that no option and no command takes, with what may have been meant. Empty if there is
@@ -41,10 +52,42 @@ std::string DescribeUnexpected(const CLI::App& i_rApp)
 	}
 	if (i_rApp.get_parent())
 		return "\"" + rWord + "\" is one argument too many; " + SeeHelp(i_rApp);
-	for (const CLI::App* pCommand :
-	    i_rApp.get_subcommands([](const CLI::App* i_pApp) { return !i_pApp->get_group().empty(); }))
-		names.push_back(pCommand->get_name());
-	return "there is no command \"" + rWord + "\"" + Meant(rWord, names) + "; " + SeeHelp(i_rApp);
+	return NoCommand(i_rApp, rWord);
+}
+
+/// A mistyped command is told before any help, which would be of the program as a whole.
+void RequireCommand(const CLI::App& i_rProgram, const std::vector<std::string>& i_rArguments)
+{
+	const auto commands =
+	    i_rProgram.get_subcommands([](const CLI::App* i_pApp) { return !i_pApp->get_name().empty(); });
+	if (commands.empty())
+		return;
+	for (std::size_t i = 0; i < i_rArguments.size(); ++i)
+	{
+		const std::string& rWord = i_rArguments[i];
+		if (rWord == "--log")
+			++i;
+		if (rWord.starts_with('-'))
+			continue;
+		if (std::none_of(
+		        commands.begin(), commands.end(), [&](const CLI::App* i_pApp) { return i_pApp->get_name() == rWord; }))
+			throw VCommandError(EWrongUsage, NoCommand(i_rProgram, rWord));
+		return;
+	}
+}
+
+/// What is wrong with the line, in this program's words.
+std::string Describe(const CLI::ParseError& i_rError, const CLI::App& i_rApp)
+{
+	const std::string text = i_rError.what();
+	const std::string name = text.substr(0, text.find_first_of(": "));
+	const CLI::Option* const pOption = i_rApp.get_option_no_throw(name);
+	if (dynamic_cast<const CLI::RequiredError*>(&i_rError))
+		return name + " is missing";
+	if (dynamic_cast<const CLI::ArgumentMismatch*>(&i_rError) && pOption)
+		return pOption->get_expected_max() == 0 ? name + " takes no value"
+		                                        : name + " needs a value: " + pOption->get_option_text();
+	return text;
 }
 
 const CLI::App& ParsedApp(const CLI::App& i_rApp)
@@ -54,6 +97,21 @@ const CLI::App& ParsedApp(const CLI::App& i_rApp)
 }
 
 } // namespace
+
+CLI::Validator OneOf(const std::vector<std::string>& i_rTexts)
+{
+	return CLI::Validator(
+	    [i_rTexts](const std::string& i_rText) -> std::string
+	    {
+		    if (std::find(i_rTexts.begin(), i_rTexts.end(), i_rText) != i_rTexts.end())
+			    return "";
+		    std::string message = "there is no \"" + i_rText + "\"" + Meant(i_rText, i_rTexts) + "; give";
+		    for (std::size_t i = 0; i < i_rTexts.size(); ++i)
+			    message += (i == 0 ? " " : i + 1 == i_rTexts.size() ? " or " : ", ") + i_rTexts[i];
+		    return message;
+	    },
+	    "");
+}
 
 void AddMessageOptions(CLI::App& io_rApp, const std::shared_ptr<VMessageSettings>& i_rpSettings)
 {
@@ -86,6 +144,7 @@ void Parse(CLI::App& io_rProgram, std::vector<std::string> i_Arguments)
 	for (std::size_t i = 0; i + 1 < i_Arguments.size() && i_Arguments[i] != "--"; ++i)
 		if (i_Arguments[i] == "-v" && LooksLikeCategoryLevel(i_Arguments[i + 1]))
 			i_Arguments[i] = "--log";
+	RequireCommand(io_rProgram, i_Arguments);
 	std::reverse(i_Arguments.begin(), i_Arguments.end());
 	try
 	{
@@ -103,7 +162,8 @@ void Parse(CLI::App& io_rProgram, std::vector<std::string> i_Arguments)
 	{
 		const std::string unexpected = DescribeUnexpected(io_rProgram);
 		throw VCommandError(EWrongUsage,
-		    unexpected.empty() ? rError.what() + std::string("; ") + SeeHelp(ParsedApp(io_rProgram)) : unexpected);
+		    unexpected.empty() ? Describe(rError, ParsedApp(io_rProgram)) + "; " + SeeHelp(ParsedApp(io_rProgram))
+		                       : unexpected);
 	}
 	if (const std::string unexpected = DescribeUnexpected(io_rProgram); !unexpected.empty())
 		throw VCommandError(EWrongUsage, unexpected);

@@ -34,13 +34,13 @@ constexpr const char* c_pWalkThrough =
     "be\nwritten. A command that fails writes nothing. Units are millimetres and radians.\n"
     "\"retarget COMMAND --help\" tells the options of a command with examples.";
 
-/// "help COMMAND" becomes "COMMAND --help".
+/// "help COMMAND" becomes "COMMAND --help", and "help help" the same as "help".
 std::vector<std::string> Expand(std::vector<std::string> i_Arguments)
 {
 	if (!i_Arguments.empty() && i_Arguments.front() == "help")
 	{
 		i_Arguments.erase(i_Arguments.begin());
-		i_Arguments.resize(std::min<std::size_t>(i_Arguments.size(), 1));
+		i_Arguments.resize(!i_Arguments.empty() && i_Arguments.front() != "help" ? 1 : 0);
 		i_Arguments.push_back("--help");
 	}
 	return i_Arguments;

@@ -1,6 +1,7 @@
 #include "retarget/RenderCommand.h"
 
 #include "retarget/Commands.h"
+#include "retarget/Parsing.h"
 
 #include <boost/filesystem/operations.hpp>
 
@@ -60,7 +61,7 @@ VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender)
 		views += (views.empty() ? "" : "|") + std::string(pView);
 	pApp->add_option("--view", pSettings->m_View, "From where (default: perspective)")
 	    ->option_text(views)
-	    ->check(CLI::IsMember(std::vector<std::string>(c_Views.begin(), c_Views.end())));
+	    ->check(OneOf(std::vector<std::string>(c_Views.begin(), c_Views.end())));
 	pApp->add_option_function<std::string>(
 	        "--size",
 	        [pSettings](const std::string& i_rText)

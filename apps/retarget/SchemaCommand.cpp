@@ -26,8 +26,10 @@ EExitStatus ShowSchema(const VOutput& i_rOut)
 
 VCommand AddSchemaCommand(CLI::App& io_rProgram)
 {
-	CLI::App* const pApp = AddCommand(io_rProgram, "schema", "Print the XML schema of the skeleton file format",
-	    {"schema > skeleton.xsd", "schema -o skeleton.xsd && xmllint --noout --schema skeleton.xsd hero.qrr"});
+	CLI::App* const pApp = AddCommand(io_rProgram, "schema",
+	    "Print the XML schema of the skeleton file format. The reader takes more than XML's own tools do with it: "
+	    "names with blanks, and targets of different kinds in any order",
+	    {"schema > skeleton.xsd", "schema -o skeleton.xsd && xmllint --noout --schema skeleton.xsd performer.qrs"});
 	const auto pOut = std::make_shared<VOutput>(VOutput{"-"});
 	pApp->add_option("-o,--output", pOut->m_Path, "Where the schema is written; - is standard output (the default)")
 	    ->option_text("FILE");

@@ -1,4 +1,5 @@
 #include "retarget/Commands.h"
+#include "retarget/Messages.h"
 #include "retarget/Output.h"
 #include "retarget/Residuals.h"
 #include "retarget/Session.h"
@@ -8,7 +9,6 @@
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
 
-#include <cstdlib>
 #include <numbers>
 #include <unistd.h>
 
@@ -147,8 +147,7 @@ std::string LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResid
 		texts.push_back(state);
 		table.AddRow(texts);
 	}
-	const char* pNoColour = std::getenv("NO_COLOR");
-	return table.Text(isatty(STDOUT_FILENO) && !(pNoColour && *pNoColour));
+	return table.Text(HasColours(STDOUT_FILENO));
 }
 
 EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)

@@ -64,7 +64,7 @@ TEST(Check, DamagedFiles)
 	            "static parameter #0 \"a\": Validation of StaticParameter 'a' expression 'b' failed, Parse Error at "
 	            "column 2",
 	            "error SubjectUtils: Error parsing subject static parameter expressions"},
-	        {"no file", {"check"}, 2, "", "FILE is required"},
+	        {"no file", {"check"}, 2, "", "FILE is missing"},
 	    },
 	    folder);
 

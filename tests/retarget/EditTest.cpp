@@ -56,6 +56,36 @@ TEST_F(Edit, RunInTheOrderOfTheLine)
 	EXPECT_NEAR(Targets()[0].at("distance"), 0.0, 1e-5);
 }
 
+TEST_F(Edit, ComeFromAFile)
+{
+	m_Folder.Write("one", "# arms\r\n--rotation LeftArm:LeftArm\r\n\n  --symmetry  \n--position=LeftFoot:LeftFoot");
+	Create({"--edits", "one", "--position", "LeftHand:LeftHand"});
+	EXPECT_EQ(Names(),
+	    (VNames{"LeftArm}LeftArm", "LeftFoot>LeftFoot", "RightFoot>RightFoot", "LeftHand>LeftHand",
+	        "RightHand>RightHand"}));
+	// Names with blanks need no quotes.
+	m_Folder.Write("blanks", "--rotation LeftHand:Bip001 L Hand\n");
+	Create({"--edits", "blanks"}, Data("fbx/heaps_biped_zup_a7100.fbx"));
+	EXPECT_EQ(Names(), (VNames{"LeftHand}Bip001 L Hand"}));
+	m_Folder.Write("slip", "\n--rotatoin a:b");
+	m_Folder.Write("value", "--prune-joints all");
+	m_Folder.Write("none", "--rotation");
+	m_Folder.Write("name", "--no-symmetry\n--rotation Hips:hip");
+	const auto with = [](const char* i_pFile) {
+		return std::vector<std::string>{"edit", "x.qrr", "--source", c_Performer, "-o", "x.qrr", "--edits", i_pFile};
+	};
+	RunRows(
+	    {
+	        {"slip", with("slip"), 3, "", "slip:2: there is no edit \"--rotatoin\"; did you mean \"--rotation\"?"},
+	        {"value", with("value"), 3, "", "value:1: --prune-joints takes no value"},
+	        {"none", with("none"), 3, "", "none:1: --rotation needs a value: SRC:TGT"},
+	        {"name", with("name"), 2, "", "name:2: there is no target segment \"hip\"; did you mean "},
+	        {"no file", with("nothing"), 3, "", "\"nothing\" could not be read as a file of edits"},
+	        {"folder", with("."), 3, "", "\".\" could not be read as a file of edits"},
+	    },
+	    m_Folder);
+}
+
 TEST_F(Edit, SymmetryNeedsAPartner)
 {
 	const std::string arnaud = Data("fbx/pab_arnaud_b7500.fbx");

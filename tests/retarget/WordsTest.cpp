@@ -144,6 +144,14 @@ TEST(Output, JsonHoldsWhatTextAndNumbersMayBe)
 	    JsonText(json), "{\n \"list\": [1.5, null, null],\n \"text\": \"a\xEF\xBF\xBD\\\"b\",\n \"empty\": []\n}");
 }
 
+TEST(HelpFormatter, FitsLines)
+{
+	EXPECT_EQ(FitLine("one two three", 7), "one two\nthree");
+	EXPECT_EQ(FitLine("  fbx x    the bones of it", 20), "  fbx x\n      the bones of\n      it");
+	EXPECT_EQ(FitLine("  fbx --root 'a b c d e' -o x", 16), "  fbx --root \\\n      'a b c d e' \\\n      -o x");
+	EXPECT_EQ(FitLine("  short", 20), "  short");
+}
+
 TEST(HelpFormatter, WrapsAtBlanks)
 {
 	EXPECT_EQ(Wrap("one two three", 7, 2), "one two\n  three");
