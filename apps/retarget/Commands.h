@@ -9,6 +9,8 @@ namespace CommandLine
 VCommand AddEvalCommand(CLI::App& io_rProgram);
 VCommand AddSchemaCommand(CLI::App& io_rProgram);
 VCommand AddFbxCommand(CLI::App& io_rProgram);
+VCommand AddBonesCommand(CLI::App& io_rProgram);
+VCommand AddSegmentsCommand(CLI::App& io_rProgram);
 VCommand AddDumpCommand(CLI::App& io_rProgram);
 VCommand AddConvertCommand(CLI::App& io_rProgram);
 VCommand AddFkCommand(CLI::App& io_rProgram);

@@ -163,8 +163,7 @@ VCommand AddFbxCommand(CLI::App& io_rProgram)
 	CLI::App* const pApp = AddCommand(io_rProgram, "fbx",
 	    "Show what an FBX file holds as JSON: up axis (0 X, 1 Y, 2 Z), unit scale (file units to millimetres) and the "
 	    "bones with their matrices (row by row, translations in millimetres); if asked for, its meshes and its skin",
-	    {"fbx hero.fbx", "fbx hero.fbx | jq -r '.bones[].name'",
-	        "fbx hero.fbx --meshes | jq -c '.placedMeshes[] | [.name, .vertexCount]'",
+	    {"fbx hero.fbx", "fbx hero.fbx --meshes | jq -c '.placedMeshes[] | [.name, .vertexCount]'",
 	        "fbx hero.fbx --skin | jq '.skin.meshes'"});
 	const auto pSettings = std::make_shared<VFbxSettings>();
 	pApp->add_option("FILE", pSettings->m_File, "FBX file, binary or ASCII")->required();

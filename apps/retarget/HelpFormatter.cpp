@@ -22,14 +22,18 @@ std::string Entry(const std::string& i_rName, const std::string& i_rText)
 
 } // namespace
 
+std::size_t TerminalWidth()
+{
+	winsize size{};
+	return isatty(STDOUT_FILENO) && ::ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) == 0 ? size.ws_col : 0;
+}
+
 std::size_t TextWidth()
 {
 	constexpr std::size_t c_Narrowest = 40;
 	constexpr std::size_t c_Widest = 100;
-	winsize size{};
-	if (!isatty(STDOUT_FILENO) || ::ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) != 0 || size.ws_col == 0)
-		return c_Widest;
-	return std::clamp<std::size_t>(size.ws_col, c_Narrowest, c_Widest);
+	const std::size_t width = TerminalWidth();
+	return width == 0 ? c_Widest : std::clamp(width, c_Narrowest, c_Widest);
 }
 
 std::string FitLine(const std::string& i_rLine, std::size_t i_Width)

@@ -21,8 +21,8 @@ constexpr const char* c_pDescription =
 
 constexpr const char* c_pWalkThrough =
     "A first retarget subject, from the character's FBX and the performer's skeleton:\n"
-    "  retarget fbx hero.fbx                  the bones of the character, its units and axes\n"
-    "  retarget dump performer.qrs            the segments of the performer\n"
+    "  retarget bones hero.fbx                the bones of the character\n"
+    "  retarget segments performer.qrs        the segments of the performer\n"
     "  retarget create --fbx hero.fbx --source performer.qrs --position Hips:Hips --rotation Hips:Hips \\\n"
     "      --symmetry --position LeftFoot:LeftFoot --rotation LeftArm:LeftArm \\\n"
     "      --prune-joints --match-file-pose --update-targets -o hero.qrr\n"
@@ -31,7 +31,7 @@ constexpr const char* c_pWalkThrough =
     "\n"
     "Results go to standard output, messages to standard error as \"level category: text\".\n"
     "Exit status: 0 fine; 1 findings; 2 wrong usage; 3 input that cannot be read or is invalid; 4 output that cannot "
-    "be\nwritten. A command that fails writes nothing. Units are millimetres and radians.\n"
+    "be written.\nA command that fails writes nothing. Units are millimetres and radians.\n"
     "\"retarget COMMAND --help\" tells the options of a command with examples.";
 
 /// "help COMMAND" becomes "COMMAND --help", and "help help" the same as "help".
@@ -109,8 +109,9 @@ VProgram MakeProgram(const VRender& i_rRender)
 	const auto addRender = [&](CLI::App& io_rProgram) { return AddRenderCommand(io_rProgram, i_rRender); };
 	using VAdd = std::function<VCommand(CLI::App&)>;
 	for (const VAdd& rAdd : {VAdd(AddCreateCommand), VAdd(AddEditCommand), VAdd(AddTargetsCommand),
-	         VAdd(AddCheckCommand), VAdd(addRender), VAdd(AddFbxCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand),
-	         VAdd(AddConvertCommand), VAdd(AddSchemaCommand), VAdd(AddEvalCommand), VAdd(AddDocumentationCommand)})
+	         VAdd(AddCheckCommand), VAdd(AddBonesCommand), VAdd(AddSegmentsCommand), VAdd(addRender),
+	         VAdd(AddFbxCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand), VAdd(AddConvertCommand),
+	         VAdd(AddSchemaCommand), VAdd(AddEvalCommand), VAdd(AddDocumentationCommand)})
 		program.m_Commands.push_back(rAdd(rApp));
 	std::vector<CLI::App*> apps{&rApp};
 	for (const VCommand& rCommand : program.m_Commands)

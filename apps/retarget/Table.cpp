@@ -32,12 +32,26 @@ void VTable::AddRow(const std::vector<std::string>& i_rTexts)
 		m_Rows.back().push_back(Printable(rText));
 }
 
-std::string VTable::Text(bool i_bBold) const
+std::vector<std::size_t> VTable::Widths() const
 {
 	std::vector<std::size_t> widths(m_Aligns.size());
 	for (const auto& rRow : m_Rows)
 		for (std::size_t i = 0; i < rRow.size(); ++i)
 			widths[i] = std::max(widths[i], Width(rRow[i]));
+	return widths;
+}
+
+std::size_t VTable::LineWidth() const
+{
+	std::size_t width = 0;
+	for (const std::size_t column : Widths())
+		width += column + (width == 0 ? 0 : 2);
+	return width;
+}
+
+std::string VTable::Text(bool i_bBold) const
+{
+	const std::vector<std::size_t> widths = Widths();
 	std::string text;
 	for (std::size_t row = 0; row < m_Rows.size(); ++row)
 	{

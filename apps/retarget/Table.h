@@ -21,8 +21,12 @@ public:
 	void AddRow(const std::vector<std::string>& i_rTexts);
 	/// One line for the titles, bold if wanted, then one for each row, without blanks at its end.
 	std::string Text(bool i_bBold) const;
+	/// Columns of the terminal that its longest line takes.
+	std::size_t LineWidth() const;
 
 private:
+	std::vector<std::size_t> Widths() const;
+
 	std::vector<EAlign> m_Aligns;
 	std::vector<std::vector<std::string>> m_Rows{1};
 };

@@ -1,4 +1,5 @@
 #include "retarget/Commands.h"
+#include "retarget/HelpFormatter.h"
 #include "retarget/Messages.h"
 #include "retarget/Output.h"
 #include "retarget/Residuals.h"
@@ -21,6 +22,7 @@ struct VTargetsSettings
 {
 	std::string m_File;
 	std::string m_Source;
+	bool m_bStates = false;
 };
 
 /// What is shown of one target; empty texts for what it does not have.
@@ -122,32 +124,47 @@ VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
 	return list;
 }
 
-std::string LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
+/// "Point" for "LocalPointToWorldPoint": what the type has in the target segment.
+std::string ShortType(std::string i_Type)
+{
+	if (i_Type.starts_with("Local"))
+		i_Type.erase(0, 5);
+	return i_Type.substr(0, i_Type.find("To"));
+}
+
+VTable LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals, bool i_bStates)
 {
 	VTable table;
 	table.AddColumn("INDEX", VTable::ERight);
-	table.AddColumn("NAME", VTable::ELeft);
 	table.AddColumn("TYPE", VTable::ELeft);
 	table.AddColumn("SOURCE", VTable::ELeft);
 	table.AddColumn("TARGET", VTable::ELeft);
 	table.AddColumn("WEIGHT", VTable::ERight);
 	if (i_bResiduals)
 		table.AddColumn("RESIDUAL", VTable::ERight);
-	table.AddColumn("STATE", VTable::ELeft);
+	if (i_bStates)
+	{
+		table.AddColumn("NAME", VTable::ELeft);
+		table.AddColumn("STATE", VTable::ELeft);
+	}
 	for (std::size_t i = 0; i < i_rLines.size(); ++i)
 	{
 		const VTargetLine& rLine = i_rLines[i];
 		std::vector<std::string> texts{
-		    std::to_string(i), rLine.m_Name, rLine.m_Type, rLine.m_Source, rLine.m_Target, Shortest(rLine.m_Weight)};
+		    std::to_string(i), ShortType(rLine.m_Type), rLine.m_Source, rLine.m_Target, Shortest(rLine.m_Weight)};
 		if (i_bResiduals)
 			texts.push_back(ResidualText(rLine.m_Residual.m_Offset));
-		std::string state;
-		for (const std::string& rExpression : rLine.m_State)
-			state += (state.empty() ? "" : " ") + rExpression;
-		texts.push_back(state);
+		if (i_bStates)
+		{
+			texts.push_back(rLine.m_Name);
+			std::string state;
+			for (const std::string& rExpression : rLine.m_State)
+				state += (state.empty() ? "" : " ") + rExpression;
+			texts.push_back(state);
+		}
 		table.AddRow(texts);
 	}
-	return table.Text(HasColours(STDOUT_FILENO));
+	return table;
 }
 
 EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)
@@ -159,7 +176,10 @@ EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)
 		session.LoadSource(i_rSettings.m_Source);
 	const std::vector<VTargetLine> lines = Lines(session, bResiduals);
 	TellDisagreement(lines);
-	PrintResult(LinesToJson(lines, bResiduals), LinesToTable(lines, bResiduals));
+	VTable table = LinesToTable(lines, bResiduals, true);
+	if (!i_rSettings.m_bStates && table.LineWidth() > TerminalWidth())
+		table = LinesToTable(lines, bResiduals, false);
+	PrintResult(LinesToJson(lines, bResiduals), table.Text(HasColours(STDOUT_FILENO)));
 	return EFine;
 }
 
@@ -176,6 +196,8 @@ VCommand AddTargetsCommand(CLI::App& io_rProgram)
 	pApp->add_option("FILE.qrr", pSettings->m_File, "The retarget subject, or a legacy one (.qrx)")->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton, for the residuals")
 	    ->option_text("FILE.qrs");
+	pApp->add_flag("--states", pSettings->m_bStates,
+	    "With the names and states of the targets, which are shown by themselves where the terminal is wide enough");
 	return {pApp, [pSettings] { return ShowTargets(*pSettings); }};
 }
 

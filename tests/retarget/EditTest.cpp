@@ -204,12 +204,31 @@ TEST_F(Edit, ToStandardOutput)
 	const VRun run = m_Folder.Run({"edit", "x.qrr", "-o", "-"});
 	EXPECT_EQ(run.m_Status, 0);
 	EXPECT_EQ(run.m_Out, m_Folder.Read("x.qrr"));
-	const VRun table = m_Folder.Run({"-q", "targets", "x.qrr"});
-	EXPECT_EQ(table.m_Out.substr(0, table.m_Out.find('\n')),
-	    "INDEX  NAME       TYPE                          SOURCE  TARGET  WEIGHT  STATE");
-	EXPECT_NE(table.m_Out.find("\n    0  Head}Head  LocalRotationToWorldRotation  Head    Head         1  "),
-	    std::string::npos)
+	EXPECT_EQ(m_Folder.Run({"-q", "targets", "x.qrr"}).m_Out,
+	    "INDEX  TYPE      SOURCE  TARGET  WEIGHT\n    0  Rotation  Head    Head         1\n");
+	const VRun table = m_Folder.Run({"-q", "targets", "x.qrr", "--states"});
+	EXPECT_EQ(
+	    table.m_Out.rfind("INDEX  TYPE      SOURCE  TARGET  WEIGHT  NAME       STATE\n    0  Rotation  Head    Head  "
+	                      "       1  Head}Head  ",
+	        0),
+	    0u)
 	    << table.m_Out;
+	const VRun segments = m_Folder.Run({"-q", "segments", "x.qrr"});
+	EXPECT_EQ(segments.m_Out.rfind("INDEX  NAME ", 0), 0u);
+	EXPECT_NE(segments.m_Out.find("\n    1    Spine "), std::string::npos) << segments.m_Out;
+	const VJson json = RunJson({"segments", "x.qrr", "--json"}, m_Folder);
+	const VJson bones = RunJson({"bones", c_Fbx, "--json"}, m_Folder);
+	ASSERT_EQ(json.size(), bones.size());
+	std::size_t followers = 0;
+	for (std::size_t i = 0; i < json.size(); ++i)
+	{
+		for (const char* pKey : {"index", "parent", "side"})
+			EXPECT_EQ(json[i].at(pKey), bones[i].at(pKey)) << i;
+		EXPECT_NEAR(json[i].at("length"), bones[i].at("length"), 1e-3) << i;
+		EXPECT_EQ(json[i].at("joint"), i == 0 ? "Free" : "Ball");
+		followers += json[i].at("follows") == VJson({"Head"});
+	}
+	EXPECT_EQ(followers, 1u);
 }
 
 /// After --match-file-pose every segment stands where an independent reader found its bone, turned to Z up, with

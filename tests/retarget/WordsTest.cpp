@@ -148,7 +148,7 @@ TEST(HelpFormatter, FitsLines)
 {
 	EXPECT_EQ(FitLine("one two three", 7), "one two\nthree");
 	EXPECT_EQ(FitLine("  fbx x    the bones of it", 20), "  fbx x\n      the bones of\n      it");
-	EXPECT_EQ(FitLine("  fbx --root 'a b c d e' -o x", 16), "  fbx --root \\\n      'a b c d e' \\\n      -o x");
+	EXPECT_EQ(FitLine("  fbx --root 'a b c d e' -o x", 20), "  fbx --root \\\n      'a b c d e' \\\n      -o x");
 	EXPECT_EQ(FitLine("  short", 20), "  short");
 }
 
