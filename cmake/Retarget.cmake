@@ -36,22 +36,31 @@ if(CCACHE AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
 	set(CMAKE_CXX_COMPILER_LAUNCHER ${CCACHE})
 endif()
 
-# retarget_library(NAME SOURCES ... [PUBLIC ...] [PRIVATE ...]): a static library that is included as "NAME/File.h".
+# retarget_library(NAME SOURCES ... [PUBLIC ...] [PRIVATE ...] [INTERNAL ...]): a static library that is included as
+# "NAME/File.h".
 function(retarget_library name)
-	cmake_parse_arguments(PARSE_ARGV 1 arg "" "" "SOURCES;PUBLIC;PRIVATE")
+	cmake_parse_arguments(PARSE_ARGV 1 arg "" "" "SOURCES;PUBLIC;PRIVATE;INTERNAL")
 	add_library(${name} STATIC ${arg_SOURCES})
 	cmake_path(GET CMAKE_CURRENT_SOURCE_DIR PARENT_PATH wing)
 	target_include_directories(${name} PUBLIC $<BUILD_INTERFACE:${wing}>)
 	target_link_libraries(${name} PUBLIC ${arg_PUBLIC} PRIVATE ${arg_PRIVATE})
-	retarget_install(${name} ${CMAKE_CURRENT_SOURCE_DIR})
+	retarget_install(${name} ${CMAKE_CURRENT_SOURCE_DIR} ${arg_INTERNAL})
 endfunction()
 
-# retarget_install(NAME FOLDER): the library and the headers of a folder go into the installed package.
+# retarget_install(NAME FOLDER [INTERNAL...]): the library and the headers of a folder go into the installed package, but
+# for the headers of these names, which are for the library alone; ALL are all.
 function(retarget_install name folder)
+	# Whoever links it compiles its headers.
+	target_compile_features(${name} PUBLIC cxx_std_20)
 	target_include_directories(${name} PUBLIC $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup>)
 	install(TARGETS ${name} EXPORT RetargetSetup ARCHIVE DESTINATION ${RETARGET_LIBRARY_DESTINATION}
 		LIBRARY DESTINATION ${RETARGET_LIBRARY_DESTINATION} RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
-	install(DIRECTORY ${folder} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup FILES_MATCHING PATTERN "*.h")
+	if(ARGN STREQUAL "ALL")
+		return()
+	endif()
+	list(TRANSFORM ARGN REPLACE "(.+)" "PATTERN;\\1;EXCLUDE" OUTPUT_VARIABLE exclude)
+	install(DIRECTORY ${folder} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup FILES_MATCHING
+		PATTERN "*.h" ${exclude})
 endfunction()
 
 # retarget_screen(VARIABLE NAME SIZE): the command by which the test of this name gets a screen of its own.
