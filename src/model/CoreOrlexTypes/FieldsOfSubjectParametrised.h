@@ -1,6 +1,7 @@
 #pragma once
 
-// A part of CoreOrlexTypes/Fields.h: include that.
+// A part of it, and compiled only with it.
+#include "CoreOrlexTypes/Fields.h"
 
 namespace CoreOrlexTypes
 {
