@@ -118,14 +118,18 @@ protected:
 	QString Answer(QMessageBox::StandardButton i_Button, const std::function<void()>& i_rAsk)
 	{
 		QString asked;
-		QTimer::singleShot(0, m_pWindow.get(),
+		QTimer timer;
+		QObject::connect(&timer, &QTimer::timeout,
 		    [&]
 		    {
 			    auto* const pBox = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
-			    ASSERT_TRUE(pBox);
+			    if (!pBox)
+				    return;
+			    timer.stop();
 			    asked = pBox->text();
 			    pBox->button(i_Button)->click();
 		    });
+		timer.start(0);
 		i_rAsk();
 		EXPECT_FALSE(asked.isEmpty());
 		return asked;

@@ -91,9 +91,12 @@ void VRetargetSetupWidget::ApplyEdits()
 void VRetargetSetupWidget::OnSourceSkeletonChanged()
 {
 	VChosenSource chosen{m_Parameters.m_pSourceSkeleton->GetValueText(), m_Parameters.m_pSourceSkin->GetValueText()};
-	if (std::exchange(m_ChosenSource, chosen) == chosen || !m_Parameters.m_pSourceSkeleton->HasValue())
+	if (std::exchange(m_ChosenSource, chosen) == chosen)
 		return;
 	m_UnreadSource.clear();
+	UpdateRemarks();
+	if (!m_Parameters.m_pSourceSkeleton->HasValue())
+		return;
 	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(chosen.m_Skeleton);
 	const std::string& rShown = m_pRetargetSetup->GetShownSourceName();
 	// A bare name is what a file of a target subject tells; where the process happens to run has nothing to do with it.
@@ -117,7 +120,7 @@ void VRetargetSetupWidget::OnSourceSkeletonChanged()
 			    "The skin '%1%' was chosen for source '%2%', and '%3%' wears it now", source.m_SkinName,
 			    RetargetSetup::FileStem(before->m_Path), RetargetSetup::FileStem(source.m_Path));
 		m_LoadedSource = source;
-		return UpdateRemarks();
+		return;
 	}
 	m_UnreadSource = UtilsFileSystem::ToUtf8(path.filename());
 	NVX_LOG(c_LogCategory, NVX::ELogError,
@@ -128,10 +131,12 @@ void VRetargetSetupWidget::OnSourceSkeletonChanged()
 
 void VRetargetSetupWidget::OnTargetFBXChanged()
 {
-	if (!m_Parameters.m_pTargetFBX->HasValue())
-		return m_ChosenFBX.reset();
 	const std::string text = m_Parameters.m_pTargetFBX->GetValueText();
 	if (std::exchange(m_ChosenFBX, text) == text)
+		return;
+	m_UnreadFBX.clear();
+	UpdateRemarks();
+	if (!m_Parameters.m_pTargetFBX->HasValue())
 		return;
 	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(text);
 	if (!path.is_absolute())
@@ -140,7 +145,6 @@ void VRetargetSetupWidget::OnTargetFBXChanged()
 		return;
 	}
 	RetargetSetup::VPanelParameters::OfferFile(*m_Parameters.m_pTargetFBX, path);
-	m_UnreadFBX.clear();
 	if (!m_pRetargetSetup->LoadTargetFBX(path))
 	{
 		m_UnreadFBX = UtilsFileSystem::ToUtf8(path.filename());
@@ -287,7 +291,9 @@ void VRetargetSetupWidget::SyncScaleParameter()
 		m_AgreedScale = scale;
 		m_pRetargetSetup->SetNextTargetScale(scale);
 	}
-	m_Parameters.m_pTargetScale->Set(scale);
+	double shown = 0.0;
+	if (!m_Parameters.m_pTargetScale->Get(shown) || !IsSame(shown, scale))
+		m_Parameters.m_pTargetScale->Set(scale);
 }
 
 void VRetargetSetupWidget::SyncSourceSkeletonParameter()
