@@ -123,6 +123,31 @@ TEST_F(ParameterView, TakesTypedNumbers)
 	EXPECT_EQ(rScale.GetValueText(), "4");
 }
 
+TEST_F(ParameterView, ShowsSixDigitsUntilItIsEdited)
+{
+	VParameter& rScale = AddScale();
+	ASSERT_TRUE(Show());
+	rScale.Set(1.0 / 3.0);
+	Run();
+	const QString whole = QString::fromStdString(rScale.GetValueText());
+	for (int i = 0; i < 2; ++i)
+	{
+		EXPECT_EQ(Shown("Scale"), "0.333333");
+		EXPECT_EQ(m_Page.Property("Scale", "toolTip"), whole);
+		Click("Scale");
+		EXPECT_EQ(Shown("Scale"), whole);
+		Click("elsewhere");
+		double value = 0.0;
+		EXPECT_TRUE(rScale.Get(value) && value == 1.0 / 3.0) << "nothing was typed";
+	}
+	Click("Scale");
+	Key(Qt::Key_End);
+	m_Page.Type("e1");
+	Click("elsewhere");
+	EXPECT_EQ(rScale.GetValueText(), "3.333333333333333");
+	EXPECT_EQ(Shown("Scale"), "3.33333");
+}
+
 TEST_F(ParameterView, RefusesVisibly)
 {
 	VParameter& rScale = AddScale();
@@ -150,7 +175,7 @@ TEST_F(ParameterView, RefusesVisibly)
 	// Beyond the limits, then typed on: the reason goes with the first key.
 	TypeInto("Weight", "500");
 	Key(Qt::Key_Return);
-	EXPECT_EQ(Error("Weight"), "Value is greater than permitted maximum");
+	EXPECT_EQ(Error("Weight"), "Value is greater than permitted maximum. Allowed: 1 to 100.");
 	EXPECT_EQ(rWeight.GetValueText(), "7");
 	Key(Qt::Key_Backspace);
 	EXPECT_EQ(Error("Weight"), "");

@@ -69,8 +69,16 @@ TEST_F(Job, TheWholeJob)
 	// What stands in a field belongs to the target that it was typed for.
 	rOperator.ClickRow("targets", 2);
 	EXPECT_EVENTUALLY(rOperator.Property("TargetWeight", "text").toString() == "1");
-	rOperator.Fill("TargetWeight", "500");
-	EXPECT_EVENTUALLY(rOperator.Property("TargetWeightReason", "visible").toBool());
+	for (const auto& [pField, pText, pReason] : {std::tuple("TargetStateExpressionX", "abc", "Give a number of mm"),
+	         {"TargetScale", "-1", "Give a number above 0"}, {"TargetWeight", "500", "Allowed: 1 to 100."}})
+	{
+		rOperator.Fill(pField, pText);
+		EXPECT_EVENTUALLY(rOperator.Property(QString(pField) + "Reason", "visible").toBool());
+		EXPECT_TRUE(rOperator.Property(QString(pField) + "Reason", "text").toString().contains(pReason)) << pField;
+		EXPECT_EQ(rOperator.Property(pField, "text").toString(), pText);
+	}
+	rOperator.Click("TargetScale");
+	rOperator.Key(Qt::Key_Escape);
 	rOperator.ClickRow("targets", 1);
 	EXPECT_EVENTUALLY(rOperator.Property("TargetWeight", "text").toString() == "1");
 	EXPECT_FALSE(rOperator.Property("TargetWeightReason", "visible").toBool());
@@ -160,6 +168,32 @@ TEST_F(Job, SelectsWithMouseAndKeys)
 			rOperator.Key(rKey.first);
 			EXPECT_EVENTUALLY(selected() == rKey.second) << rKey.first;
 		}
+		// A range, whole or of what a filter shows; what is typed filters.
+		const auto count = [&] {
+			return m_pWindow->Context()
+			    .GetSelectionManager()
+			    ->Selection()
+			    .ItemsOfKind(rList[0] == 's' ? 11 : 14)
+			    .size();
+		};
+		rOperator.ClickRow(rList, 2);
+		rOperator.ClickRow(rList, 6, Qt::ShiftModifier);
+		EXPECT_EQ(count(), 5u);
+		rOperator.Key(Qt::Key_Up, Qt::ShiftModifier);
+		EXPECT_EQ(count(), 4u);
+		rOperator.Key(Qt::Key_PageDown);
+		EXPECT_EVENTUALLY(selected() > 8);
+		rOperator.Key(Qt::Key_PageUp);
+		EXPECT_EVENTUALLY(selected() == 5);
+		rOperator.Type("a l");
+		EXPECT_EQ(rOperator.Property(rList + "Filter", "text").toString(), "a l");
+		EXPECT_FALSE(rOperator.Property(rList + "Row0", "visible").toBool());
+		rOperator.Key(Qt::Key_Return);
+		EXPECT_EVENTUALLY(rOperator.Property(rList + "Row" + QString::number(selected()), "visible").toBool());
+		rOperator.Key(Qt::Key_Escape);
+		EXPECT_TRUE(rOperator.Property(rList + "Row0", "visible").toBool());
+		rOperator.Key(Qt::Key_Home);
+		EXPECT_EVENTUALLY(selected() == 0);
 		auto& rPreSelection = m_pWindow->Context().GetSelectionManager()->PreSelection();
 		rOperator.Hover(rList + "Row2");
 		EXPECT_EVENTUALLY(rPreSelection.Items().size() == 1 && rPreSelection.Items()[0].m_ElementIndex == 2);

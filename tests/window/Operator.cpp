@@ -75,8 +75,10 @@ void VOperator::WaitForDrawing() const
 
 void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers)
 {
-	const QQuickItem* const pItem = Item(i_rName);
+	QQuickItem* const pItem = Item(i_rName);
 	ASSERT_TRUE(pItem && pItem->isEnabled() && pItem->isVisible()) << i_rName.toStdString();
+	// As with the wheel.
+	QMetaObject::invokeMethod(Item("leftView"), "reveal", Q_ARG(QVariant, QVariant::fromValue(pItem)));
 	const auto middle = [&] { return pItem->mapToScene({pItem->width() / 2, pItem->height() / 2}).toPoint(); };
 	// Not while the layout still moves it.
 	QPoint place;

@@ -23,6 +23,12 @@ void VRetargetSetupSegmentModel::SetSubject(std::shared_ptr<const VSubjectParame
 	endResetModel();
 }
 
+bool VRetargetSetupSegmentModel::HasJoint(int i_Row) const
+{
+	return i_Row >= 0 && i_Row < rowCount()
+	    && m_pSubject->m_Segments[std::size_t(i_Row)].m_Joint.m_JointType != VSubjectParametrised::VJoint::EDummy;
+}
+
 int VRetargetSetupSegmentModel::rowCount(const QModelIndex& i_rParent) const
 {
 	return i_rParent.isValid() ? 0 : int(m_pSubject->m_Segments.size());

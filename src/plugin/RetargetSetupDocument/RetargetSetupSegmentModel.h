@@ -31,6 +31,9 @@ public:
 	/// Shares the subject, which must not be null. Always resets the list.
 	void SetSubject(std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> i_pSubject);
 
+	/// The segment can move against the one above it. False outside the list.
+	Q_INVOKABLE bool HasJoint(int i_Row) const;
+
 	int rowCount(const QModelIndex& i_rParent = {}) const override;
 	int columnCount(const QModelIndex& i_rParent = {}) const override;
 	QVariant data(const QModelIndex& i_rIndex, int i_Role) const override;

@@ -27,12 +27,18 @@ Rectangle {
 		: countReason(RetargetSetupSelection.sourceSegmentCount, "source segment")
 		|| countReason(RetargetSetupSelection.targetSegmentCount, "target segment")
 	readonly property string targetReason: countReason(RetargetSetupSelection.targetCount, "target")
+	// Why the selected segment has no manipulator.
+	readonly property string jointReason: {
+		const index = RetargetSetupSelection.selectedTargetSegment
+		return canAddTarget || index === -1 || TargetSegmentModel.HasJoint(index) ? "" : segmentName(TargetSegmentModel, index)
+			+ " has no joint, so nothing turns it: \"Create all joints\" gives it one."
+	}
 	// What "Save" writes: the file that was last loaded or saved.
 	property var currentTargetSubjectURL: null
 
 	// Below these something would be cut off.
 	readonly property real minimumWidth: columns.minimumWidth
-	readonly property real minimumHeight: leftColumn.implicitHeight + 2 * Theme.margin
+	readonly property real minimumHeight: 15 * Theme.itemHeight
 
 	Accessible.role: Accessible.Pane
 	Accessible.name: "Retarget Setup"
@@ -43,9 +49,32 @@ Rectangle {
 			: count > 1 ? count + " " + what + "s are selected: select only one." : ""
 	}
 
+	// A line for each target of a segment, source or target.
+	function mappingOf(name, source) {
+		const roles = RetargetSetupTargetModel
+		const lines = []
+		for (let row = 0; row < TargetModel.rowCount(); ++row) {
+			const index = TargetModel.index(row, 0)
+			const pair = [TargetModel.data(index, roles.SourceSegment), TargetModel.data(index, roles.TargetSegment)]
+			if (pair[source ? 0 : 1] === name)
+				lines.push(TargetModel.data(index, roles.TargetType) + " target " + (source ? "of " + pair[1] : "at " + pair[0]))
+		}
+		return lines.join("\n")
+	}
+
 	function segmentName(model, index) {
 		return model.data(model.index(index, 0), RetargetSetupSegmentModel.Name)
 	}
+
+	// In the form that files have, whatever the computer's language.
+	function isNumber(text) {
+		return /^\s*[-+]?(\d+\.?\d*|\.\d+)([eE][-+]?\d+)?\s*$/.test(text) && isFinite(Number(text))
+	}
+	readonly property var lengthHint: ({
+		unit: "mm",
+		check: text => text.trim() === "" || isNumber(text) ? ""
+			: "\"" + text + "\" is no length. Give a number of mm, such as -12.5."
+	})
 
 	function addTarget(positionTarget) {
 		run(() => ContextRetargetSetup.AddTarget(RetargetSetupSelection.selectedSourceSegment,
@@ -133,6 +162,9 @@ Rectangle {
 		target: TargetSegmentModel
 		function onModelReset() {
 			status.told = ""
+			// What is made next is no longer that file's.
+			if (TargetSegmentModel.rowCount() === 0)
+				retargetSetup.currentTargetSubjectURL = null
 		}
 	}
 
@@ -214,192 +246,239 @@ Rectangle {
 				acceptedButtons: Qt.NoButton
 			}
 
-			ColumnLayout {
-				id: leftColumn
-
-				readonly property real minimumWidth: Math.ceil(Math.max(fileButtons.implicitWidth,
-					jointControls.implicitWidth, addControls.implicitWidth)) + 2 * Theme.margin
-				// The two boxes stand below each other.
-				readonly property real symmetryWidth: Math.max(jointSymmetry.implicitWidth, targetSymmetry.implicitWidth)
-
+			Flickable {
+				id: leftView
+				objectName: "leftView"
 				anchors.fill: parent
-				anchors.margins: Theme.margin
-				spacing: Theme.spacing
-
-				ParameterView {
-					objectName: "subjectParameters"
-					Layout.fillWidth: true
-					model: retargetSetup.subjectParametersModel
+				contentHeight: leftColumn.height + 2 * Theme.margin
+				boundsBehavior: Flickable.StopAtBounds
+				interactive: contentHeight > height
+				clip: true
+				ScrollBar.vertical: OrlexScrollBar {
+					id: leftBar
 				}
 
-				Text {
-					objectName: "remarks"
-					Layout.fillWidth: true
-					Layout.preferredWidth: 0
-					visible: text !== ""
-					text: contextQuickWidget.remarks
-					textFormat: Text.PlainText
-					wrapMode: Text.Wrap
-					font.pixelSize: Theme.fontSize
-					color: Theme.warning
-					Accessible.role: Accessible.AlertMessage
-					Accessible.name: text
+				// Scrolls until an item of the column can be seen.
+				function reveal(item) {
+					for (let parent = item; parent !== leftColumn; parent = parent.parent)
+						if (!parent)
+							return
+					const top = item.mapToItem(leftColumn, 0, 0).y
+					contentY = Math.max(Math.min(contentY, top), top + item.height + 2 * Theme.margin - height)
 				}
 
-				RowLayout {
+				readonly property Item focusItem: Window.activeFocusItem
+				onFocusItemChanged: reveal(focusItem)
+
+				ColumnLayout {
+					id: leftColumn
+
+					readonly property real minimumWidth: Math.ceil(Math.max(fileButtons.implicitWidth,
+						jointControls.implicitWidth, addControls.implicitWidth)) + 2 * Theme.margin + leftBar.width
+					// The two boxes stand below each other.
+					readonly property real symmetryWidth: Math.max(jointSymmetry.implicitWidth, targetSymmetry.implicitWidth)
+
+					x: Theme.margin
+					y: Theme.margin
+					width: leftView.width - 2 * Theme.margin - (leftView.interactive ? leftBar.width : 0)
+					height: Math.max(implicitHeight, leftView.height - 2 * Theme.margin)
 					spacing: Theme.spacing
 
-					OrlexLabel {
-						objectName: "currentFile"
-						Layout.fillWidth: true
-						text: "Current file: " + (retargetSetup.currentTargetSubjectURL
-							? Tessel.fileName(retargetSetup.currentTargetSubjectURL) : "*None*")
+					OrlexDisclosure {
+						id: fold
+						objectName: "files"
+						text: "Performer and character"
+						checked: true
 					}
-					OrlexLabel {
-						objectName: "unsavedMark"
-						visible: ContextRetargetSetup.unsavedChanges
-						text: "\u25cf not saved"
+					ParameterView {
+						objectName: "subjectParameters"
+						visible: fold.checked
+						Layout.fillWidth: true
+						hints: ({
+							TargetScale: {
+								check: text => retargetSetup.isNumber(text) && Number(text) > 0 ? ""
+									: "\"" + text + "\" is no scale. Give a number above 0, such as 1.25."
+							}
+						})
+						model: retargetSetup.subjectParametersModel
+					}
+
+					Text {
+						objectName: "remarks"
+						Layout.fillWidth: true
+						Layout.preferredWidth: 0
+						visible: text !== ""
+						text: contextQuickWidget.remarks
+						textFormat: Text.PlainText
+						wrapMode: Text.Wrap
+						font.pixelSize: Theme.fontSize
 						color: Theme.warning
-						toolTip: "The target subject has changes that are in no file"
+						Accessible.role: Accessible.AlertMessage
+						Accessible.name: text
 					}
-				}
 
-				RowLayout {
-					id: fileButtons
-					spacing: Theme.spacing
+					RowLayout {
+						spacing: Theme.spacing
+
+						OrlexLabel {
+							objectName: "currentFile"
+							Layout.fillWidth: true
+							text: "Current file: " + (retargetSetup.currentTargetSubjectURL
+								? Tessel.fileName(retargetSetup.currentTargetSubjectURL) : "*None*")
+						}
+						OrlexLabel {
+							objectName: "unsavedMark"
+							visible: ContextRetargetSetup.unsavedChanges
+							text: "\u25cf not saved"
+							color: Theme.warning
+							toolTip: "The target subject has changes that are in no file"
+						}
+					}
+
+					RowLayout {
+						id: fileButtons
+						spacing: Theme.spacing
+
+						OrlexButton {
+							objectName: "createTargetSubject"
+							Layout.fillWidth: true
+							text: "Create Target Subject"
+							toolTip: "Create a retarget skeleton for the selected FBX"
+							onClicked: retargetSetup.run(() => ContextRetargetSetup.CreateTargetSubject())
+						}
+						OrlexButton {
+							objectName: "load"
+							text: "Load"
+							toolTip: "Load an existing retarget skeleton from disk"
+							onClicked: loadDialog.open()
+						}
+						OrlexButton {
+							objectName: "save"
+							text: "Save"
+							toolTip: "Save the current retarget skeleton to the last filename"
+							enabled: !!retargetSetup.currentTargetSubjectURL
+							readonly property string disabledReason: "No retarget subject was loaded or saved yet: use Save As."
+							onClicked: retargetSetup.save()
+						}
+						OrlexButton {
+							objectName: "saveAs"
+							text: "Save As"
+							toolTip: "Save the current retarget skeleton to a new file"
+							onClicked: saveDialog.open()
+						}
+					}
+
+					RowLayout {
+						id: jointControls
+						spacing: Theme.spacing
+
+						OrlexButton {
+							objectName: "createAllJoints"
+							Layout.fillWidth: true
+							text: "Create all joints"
+							toolTip: "Add a joint to every segment in the retarget skeleton"
+							onClicked: retargetSetup.run(() => ContextRetargetSetup.CreateAllJoints())
+						}
+						OrlexButton {
+							objectName: "removeUnnecessaryJoints"
+							Layout.fillWidth: true
+							text: "Remove unnecessary joints"
+							toolTip: "Remove joints from segments with no targets on themselves or their children"
+							onClicked: retargetSetup.run(() => ContextRetargetSetup.RemoveUnnecessaryJoints())
+						}
+						PropertyCheckBox {
+							id: jointSymmetry
+							objectName: "jointSymmetry"
+							Layout.preferredWidth: leftColumn.symmetryWidth
+							text: "Joint symmetry"
+							toolTip: "Apply mirrored rotation to left and right segments"
+							target: ContextRetargetSetup
+							property: "jointSymmetry"
+						}
+					}
+
+					RowLayout {
+						id: addControls
+						spacing: Theme.spacing
+
+						OrlexButton {
+							objectName: "addPositionTarget"
+							Layout.fillWidth: true
+							text: "Add position target"
+							toolTip: "Add a world-space position target for the selected segments. Shortcut: Alt+T"
+							enabled: retargetSetup.canAddTarget
+							readonly property string disabledReason: retargetSetup.addTargetReason
+							onClicked: retargetSetup.addTarget(true)
+						}
+						OrlexButton {
+							objectName: "addRotationTarget"
+							Layout.fillWidth: true
+							text: "Add rotation target"
+							toolTip: "Add a world-space rotation target for the selected segments. Shortcut: Alt+R"
+							enabled: retargetSetup.canAddTarget
+							readonly property string disabledReason: retargetSetup.addTargetReason
+							onClicked: retargetSetup.addTarget(false)
+						}
+						OrlexCheckBox {
+							id: targetSymmetry
+							objectName: "targetSymmetry"
+							Layout.preferredWidth: leftColumn.symmetryWidth
+							text: "Target symmetry"
+							toolTip: "Create matching targets on left and right"
+						}
+					}
 
 					OrlexButton {
-						objectName: "createTargetSubject"
+						objectName: "updateTargets"
 						Layout.fillWidth: true
-						text: "Create Target Subject"
-						toolTip: "Create a retarget skeleton for the selected FBX"
-						onClicked: retargetSetup.run(() => ContextRetargetSetup.CreateTargetSubject())
+						text: "Update targets"
+						toolTip: "Recalculate offsets to each target based on the current pose"
+						onClicked: retargetSetup.run(() => ContextRetargetSetup.UpdateTargets())
 					}
-					OrlexButton {
-						objectName: "load"
-						text: "Load"
-						toolTip: "Load an existing retarget skeleton from disk"
-						onClicked: loadDialog.open()
-					}
-					OrlexButton {
-						objectName: "save"
-						text: "Save"
-						toolTip: "Save the current retarget skeleton to the last filename"
-						enabled: !!retargetSetup.currentTargetSubjectURL
-						readonly property string disabledReason: "No retarget subject was loaded or saved yet: use Save As."
-						onClicked: retargetSetup.save()
-					}
-					OrlexButton {
-						objectName: "saveAs"
-						text: "Save As"
-						toolTip: "Save the current retarget skeleton to a new file"
-						onClicked: saveDialog.open()
-					}
-				}
 
-				RowLayout {
-					id: jointControls
-					spacing: Theme.spacing
-
-					OrlexButton {
-						objectName: "createAllJoints"
+					RetargetSetupTargetTable {
+						objectName: "targets"
 						Layout.fillWidth: true
-						text: "Create all joints"
-						toolTip: "Add a joint to every segment in the retarget skeleton"
-						onClicked: retargetSetup.run(() => ContextRetargetSetup.CreateAllJoints())
+						emptyText: targetSegments.count === 0
+							? "Choose a source skeleton and a target FBX above, then create the target subject."
+							: sourceSegments.count === 0 ? "Choose a source skeleton above."
+							: "Select one segment in each list on the right, or in the view, where a click with "
+							+ "Shift or Ctrl adds to what is selected. Then add a target."
+						Layout.fillHeight: true
+						// Five rows under their header.
+						Layout.minimumHeight: 6 * Theme.itemHeight
 					}
-					OrlexButton {
-						objectName: "removeUnnecessaryJoints"
-						Layout.fillWidth: true
-						text: "Remove unnecessary joints"
-						toolTip: "Remove joints from segments with no targets on themselves or their children"
-						onClicked: retargetSetup.run(() => ContextRetargetSetup.RemoveUnnecessaryJoints())
-					}
-					PropertyCheckBox {
-						id: jointSymmetry
-						objectName: "jointSymmetry"
-						Layout.preferredWidth: leftColumn.symmetryWidth
-						text: "Joint symmetry"
-						toolTip: "Apply mirrored rotation to left and right segments"
-						target: ContextRetargetSetup
-						property: "jointSymmetry"
-					}
-				}
-
-				RowLayout {
-					id: addControls
-					spacing: Theme.spacing
 
 					OrlexButton {
-						objectName: "addPositionTarget"
+						objectName: "removeTarget"
 						Layout.fillWidth: true
-						text: "Add position target"
-						toolTip: "Add a world-space position target for the selected segments. Shortcut: Alt+T"
-						enabled: retargetSetup.canAddTarget
-						readonly property string disabledReason: retargetSetup.addTargetReason
-						onClicked: retargetSetup.addTarget(true)
+						text: "Remove target"
+						toolTip: "Delete the selected target"
+						enabled: RetargetSetupSelection.selectedTarget !== -1
+						readonly property string disabledReason: retargetSetup.targetReason
+						onClicked: retargetSetup.run(() => ContextRetargetSetup.RemoveTarget(RetargetSetupSelection.selectedTarget))
 					}
-					OrlexButton {
-						objectName: "addRotationTarget"
+
+					ParameterView {
+						id: targetParameters
+
+						// What was typed for one target must not stand at another.
+						readonly property int shownTarget: RetargetSetupSelection.selectedTarget
+
+						objectName: "targetParameters"
 						Layout.fillWidth: true
-						text: "Add rotation target"
-						toolTip: "Add a world-space rotation target for the selected segments. Shortcut: Alt+R"
-						enabled: retargetSetup.canAddTarget
-						readonly property string disabledReason: retargetSetup.addTargetReason
-						onClicked: retargetSetup.addTarget(false)
+						readonly property string disabledReason: retargetSetup.targetReason
+						enabled: shownTarget !== -1
+						// Nothing below or above moves when a rotation target is chosen, which shows less.
+						Layout.minimumHeight: 4 * Theme.controlHeight + 3 * Theme.spacing / 2
+						hints: ({
+							TargetStateExpressionX: retargetSetup.lengthHint,
+							TargetStateExpressionY: retargetSetup.lengthHint,
+							TargetStateExpressionZ: retargetSetup.lengthHint
+						})
+						model: retargetSetup.targetParametersModel
+						onShownTargetChanged: restore()
 					}
-					OrlexCheckBox {
-						id: targetSymmetry
-						objectName: "targetSymmetry"
-						Layout.preferredWidth: leftColumn.symmetryWidth
-						text: "Target symmetry"
-						toolTip: "Create matching targets on left and right"
-					}
-				}
-
-				OrlexButton {
-					objectName: "updateTargets"
-					Layout.fillWidth: true
-					text: "Update targets"
-					toolTip: "Recalculate offsets to each target based on the current pose"
-					onClicked: retargetSetup.run(() => ContextRetargetSetup.UpdateTargets())
-				}
-
-				RetargetSetupTargetTable {
-					objectName: "targets"
-					Layout.fillWidth: true
-					emptyText: targetSegments.count === 0
-						? "Choose a source skeleton and a target FBX above, then create the target subject."
-						: sourceSegments.count === 0 ? "Choose a source skeleton above."
-						: "Select one segment in each list on the right, or in the view, where a click with "
-						+ "Shift or Ctrl adds to what is selected. Then add a target."
-					Layout.fillHeight: true
-					// Room for reasons of refusal beside the parameters.
-					Layout.minimumHeight: 3 * Theme.itemHeight
-				}
-
-				OrlexButton {
-					objectName: "removeTarget"
-					Layout.fillWidth: true
-					text: "Remove target"
-					toolTip: "Delete the selected target"
-					enabled: RetargetSetupSelection.selectedTarget !== -1
-					readonly property string disabledReason: retargetSetup.targetReason
-					onClicked: retargetSetup.run(() => ContextRetargetSetup.RemoveTarget(RetargetSetupSelection.selectedTarget))
-				}
-
-				ParameterView {
-					id: targetParameters
-
-					// What was typed for one target must not stand at another.
-					readonly property int shownTarget: RetargetSetupSelection.selectedTarget
-
-					objectName: "targetParameters"
-					Layout.fillWidth: true
-					readonly property string disabledReason: retargetSetup.targetReason
-					enabled: shownTarget !== -1
-					model: retargetSetup.targetParametersModel
-					onShownTargetChanged: restore()
 				}
 			}
 		}
@@ -506,7 +585,7 @@ Rectangle {
 				page: left
 				place: Qt.point(behind.mouseX, behind.mouseY)
 				pointing: behind.containsMouse
-				next: retargetSetup.addTargetReason || "Alt+T ties "
+				next: retargetSetup.jointReason || retargetSetup.addTargetReason || "Alt+T ties "
 					+ segmentName(TargetSegmentModel, RetargetSetupSelection.selectedTargetSegment) + " to "
 					+ segmentName(SourceSegmentModel, RetargetSetupSelection.selectedSourceSegment)
 					+ " by position, Alt+R by rotation."
@@ -536,6 +615,7 @@ Rectangle {
 					Layout.fillHeight: true
 					title: "Source Segments"
 					model: SourceSegmentModel
+					mappingOf: name => retargetSetup.mappingOf(name, true)
 					selectedIndex: RetargetSetupSelection.selectedSourceSegment
 				}
 				OrlexLabel {
@@ -551,6 +631,8 @@ Rectangle {
 					Layout.fillHeight: true
 					title: "Target Segments"
 					model: TargetSegmentModel
+					marksJoints: true
+					mappingOf: name => retargetSetup.mappingOf(name, false)
 					selectedIndex: RetargetSetupSelection.selectedTargetSegment
 				}
 			}

@@ -6,7 +6,7 @@ import Orlex.Theme 1.0
 import TesselPluginRetargetSetup 1.0
 
 // The segments of a subject. What is selected is the host's business: a row shows it, and the mouse and the keys ask
-// for it.
+// for it. What is typed filters the rows.
 FocusScope {
 	id: segmentList
 
@@ -18,44 +18,120 @@ FocusScope {
 	property int selectedIndex: -1
 	// The row that the keys move from. The view's own current row is lost when the model is reset.
 	property int keyIndex: -1
+	// The row that a range begins at.
+	property int anchorIndex: -1
+	// Segments without a joint look different.
+	property bool marksJoints: false
+	// What a segment is mapped to, by its name: lines for the tool tip.
+	property var mappingOf: name => ""
+
+	readonly property var words: filter.text.toLowerCase().split(" ").filter(word => word !== "")
 
 	Accessible.role: Accessible.List
 	Accessible.name: title
 
-	function selectItem(index, toggle) {
-		forceActiveFocus()
-		if (index < 0 || index >= view.count)
-			return
-		const item = model.data(model.index(index, 0), RetargetSetupSegmentModel.SelectionItem)
-		if (toggle)
-			SelectionManager.toggle(item)
-		else
-			SelectionManager.clearAndSelect(item)
+	function nameOf(index) {
+		return model.data(model.index(index, 0), RetargetSetupSegmentModel.Name)
+	}
+	function itemOf(index) {
+		return model.data(model.index(index, 0), RetargetSetupSegmentModel.SelectionItem)
+	}
+	function shows(name) {
+		const plain = name.toLowerCase()
+		return words.every(word => plain.includes(word))
+	}
+	// So many shown rows away, as far as there are any.
+	function shownFrom(index, by) {
+		const step = by < 0 ? -1 : 1
+		let found = index
+		for (let at = index + step, left = Math.abs(by); at >= 0 && at < view.count && left > 0; at += step)
+			if (shows(nameOf(at))) {
+				found = at
+				--left
+			}
+		return found
+	}
+
+	function moveTo(index) {
 		keyIndex = index
 		view.currentIndex = index
+		view.positionViewAtIndex(index, ListView.Contain)
+	}
+	function takeKeyboard() {
+		if (!filter.activeFocus)
+			view.forceActiveFocus()
+	}
+	function selectItem(index, toggle) {
+		takeKeyboard()
+		if (index < 0 || index >= view.count)
+			return
+		if (toggle)
+			SelectionManager.toggle(itemOf(index))
+		else
+			SelectionManager.clearAndSelect(itemOf(index))
+		anchorIndex = index
+		moveTo(index)
+	}
+	// All shown rows from the last one that was selected alone.
+	function selectTo(index) {
+		takeKeyboard()
+		if (index < 0 || index >= view.count)
+			return
+		const from = anchorIndex >= 0 && anchorIndex < view.count ? anchorIndex : index
+		SelectionManager.clearAndSelect(itemOf(from))
+		for (let at = from; at !== index;) {
+			at += index < from ? -1 : 1
+			if (shows(nameOf(at)))
+				SelectionManager.toggle(itemOf(at))
+		}
+		anchorIndex = from
+		moveTo(index)
 	}
 
 	onSelectedIndexChanged: {
 		if (selectedIndex === -1)
 			return
+		anchorIndex = selectedIndex
 		keyIndex = selectedIndex
 		view.positionViewAtIndex(selectedIndex, ListView.Contain)
 	}
 
-	Keys.onUpPressed: selectItem(Math.min(keyIndex, view.count) - 1, false)
-	Keys.onDownPressed: selectItem(keyIndex + 1, false)
 	Keys.onPressed: {
-		if (event.key === Qt.Key_Home)
-			selectItem(0, false)
-		else if (event.key === Qt.Key_End)
-			selectItem(view.count - 1, false)
-		else
-			return
+		const page = Math.max(1, Math.floor(view.height / Theme.itemHeight) - 1)
+		const from = Math.min(keyIndex, view.count)
+		const index = event.key === Qt.Key_Up ? shownFrom(from, -1) : event.key === Qt.Key_Down ? shownFrom(from, 1)
+			: event.key === Qt.Key_PageUp ? shownFrom(from, -page) : event.key === Qt.Key_PageDown ? shownFrom(from, page)
+			: event.key === Qt.Key_Home ? shownFrom(-1, 1) : event.key === Qt.Key_End ? shownFrom(view.count, -1) : null
 		event.accepted = true
+		if (index !== null)
+			event.modifiers & Qt.ShiftModifier ? selectTo(index) : selectItem(index, false)
+		else if (event.key === Qt.Key_Escape && filter.text !== "") {
+			filter.clear()
+			view.forceActiveFocus()
+		}
+		else if (event.text.trim() !== "" && event.key !== Qt.Key_Delete
+				&& !(event.modifiers & (Qt.ControlModifier | Qt.AltModifier)) && !filter.activeFocus) {
+			filter.forceActiveFocus()
+			filter.insert(filter.length, event.text)
+		}
+		else
+			event.accepted = false
+	}
+
+	OrlexTextField {
+		id: filter
+		objectName: segmentList.objectName + "Filter"
+		anchors.left: parent.left
+		anchors.right: parent.right
+		placeholderText: "Filter"
+		toolTip: "Shows the segments whose names hold every word. Typing in the list begins here, Escape ends it."
+		Accessible.name: segmentList.title + ": filter"
+		onAccepted: segmentList.selectItem(segmentList.shownFrom(-1, 1), false)
 	}
 
 	Rectangle {
-		anchors.fill: parent
+		anchors.fill: view
+		anchors.margins: -1
 		color: Theme.dark
 		border.color: segmentList.activeFocus ? Theme.active : Theme.mid
 	}
@@ -66,6 +142,7 @@ FocusScope {
 		objectName: segmentList.objectName + "View"
 		anchors.fill: parent
 		anchors.margins: 1
+		anchors.topMargin: filter.height + 3
 		clip: true
 		focus: true
 		boundsBehavior: Flickable.StopAtBounds
@@ -88,12 +165,19 @@ FocusScope {
 		delegate: Rectangle {
 			id: row
 
+			readonly property bool jointless: segmentList.marksJoints && !segmentList.model.HasJoint(index)
+			readonly property string about: area.containsMouse ? [label.truncated ? name : "",
+				segmentList.mappingOf(name), jointless ? "Has no joint: it does not turn by itself." : ""]
+				.filter(line => line !== "").join("\n") : ""
+
 			objectName: segmentList.objectName + "Row" + index
 			width: ListView.view.width
-			height: Theme.itemHeight
+			height: visible ? Theme.itemHeight : 0
+			visible: segmentList.shows(name)
 			color: watcher.selected ? Theme.light : watcher.preselected ? Theme.midlight : Theme.dark
 			Accessible.role: Accessible.ListItem
 			Accessible.name: name
+			Accessible.description: jointless ? "no joint" : ""
 			Accessible.selected: watcher.selected
 			Accessible.onPressAction: segmentList.selectItem(index, false)
 
@@ -109,7 +193,8 @@ FocusScope {
 				anchors.rightMargin: bar.width + (mark.visible ? mark.width + Theme.spacing : 0)
 				text: name
 				elide: Text.ElideRight
-				color: watcher.selected ? Theme.bright : Theme.text
+				font.italic: row.jointless
+				color: watcher.selected ? Theme.bright : row.jointless ? Theme.disabledText : Theme.text
 				ownToolTip: false
 				Accessible.ignored: true
 			}
@@ -127,11 +212,17 @@ FocusScope {
 				hoverEnabled: true
 				onEntered: SelectionManager.preselect(selectionItem)
 				onExited: SelectionManager.clearPreselection()
-				onPressed: segmentList.selectItem(index, mouse.modifiers & Qt.ControlModifier)
+				onPressed: {
+					view.forceActiveFocus()
+					if (mouse.modifiers & Qt.ShiftModifier)
+						segmentList.selectTo(index)
+					else
+						segmentList.selectItem(index, mouse.modifiers & Qt.ControlModifier)
+				}
 			}
 			OrlexToolTip {
-				visible: area.containsMouse && label.truncated
-				text: name
+				visible: row.about !== ""
+				text: row.about
 			}
 		}
 	}

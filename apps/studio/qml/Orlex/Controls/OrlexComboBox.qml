@@ -40,6 +40,18 @@ Item {
 		if (count > 0 && index !== currentIndex)
 			pick(index)
 	}
+	// The next entry behind a place that begins with a text, around the end; -1 if there is none.
+	function findFrom(index, text) {
+		for (let i = 1; i <= count; ++i) {
+			const at = (Math.max(index, -1) + i) % count
+			if (model[at].trim().toLowerCase().startsWith(text.toLowerCase()))
+				return at
+		}
+		return -1
+	}
+	function typesText(event) {
+		return event.text.trim() !== "" && !(event.modifiers & (Qt.ControlModifier | Qt.AltModifier))
+	}
 	function open(filter) {
 		filterField.text = filterable ? filter : ""
 		popup.refill()
@@ -64,8 +76,17 @@ Item {
 			steps ? step(event.key === Qt.Key_Up ? -1 : 1) : open("")
 		else if (steps && (event.key === Qt.Key_Home || event.key === Qt.Key_End))
 			step(event.key === Qt.Key_Home ? -count : count)
-		else if (filterable && event.text.trim() !== "" && !(event.modifiers & (Qt.ControlModifier | Qt.AltModifier)))
+		else if (filterable && typesText(event))
 			open(event.text)
+		else if (typesText(event) && findFrom(currentIndex, event.text) >= 0) {
+			const found = findFrom(currentIndex, event.text)
+			if (steps)
+				pick(found)
+			else {
+				open("")
+				list.currentIndex = found
+			}
+		}
 		else
 			event.accepted = false
 	}
@@ -222,6 +243,11 @@ Item {
 				else if (event.key === Qt.Key_Tab || event.key === Qt.Key_Backtab) {
 					popup.close()
 					control.nextItemInFocusChain(event.key === Qt.Key_Tab).forceActiveFocus(Qt.TabFocusReason)
+				}
+				else if (!control.filterable && control.typesText(event)) {
+					const found = control.findFrom(list.currentIndex, event.text)
+					if (found >= 0)
+						list.currentIndex = found
 				}
 				else
 					event.accepted = false

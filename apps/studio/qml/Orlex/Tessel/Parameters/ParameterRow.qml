@@ -11,6 +11,8 @@ Item {
 	property int parameterIndex: -1
 	property var groupModel
 	property int labelWidth: 100
+	// {unit, check}, as in ParameterView.
+	property var hint: ({})
 
 	property int generation: 0
 
@@ -18,7 +20,15 @@ Item {
 	property string refusedText: ""
 	readonly property string name: parameter.name
 	readonly property string label: parameter.display || parameter.name
-	readonly property string toolTip: parameter.description || ""
+	readonly property string toolTip: [parameter.description || "", allowed].filter(line => line !== "").join("\n")
+	// What the limits let through, as a sentence.
+	readonly property string allowed: isNumber(parameter.minimum) && isNumber(parameter.maximum)
+		? "Allowed: " + parameter.minimum + " to " + parameter.maximum + "."
+		: isNumber(parameter.minimum) ? "Allowed: " + parameter.minimum + " or more."
+		: isNumber(parameter.maximum) ? "Allowed: " + parameter.maximum + " or less." : ""
+	readonly property string unit: hint.unit || ""
+	// Shown in a few digits where it is not typed into.
+	readonly property bool numeric: parameter.type === "double" || unit !== ""
 	readonly property string valueText: parameter.valueText === undefined ? "" : parameter.valueText
 	readonly property string defaultText: parameter.defaultText || ""
 	readonly property var enumNames: parameter.enumNames || []
@@ -46,7 +56,12 @@ Item {
 	// Hands a text to the parameter: true if it was taken. Otherwise the reason stands in "error" and the parameter
 	// keeps what it had.
 	function commit(text) {
-		error = groupModel.setValueText(parameterIndex, text)
+		error = hint.check ? hint.check(text) : ""
+		if (error === "") {
+			error = groupModel.setValueText(parameterIndex, text)
+			if (error !== "" && allowed !== "")
+				error += ". " + allowed
+		}
 		refusedText = error !== "" ? text : ""
 		return error === ""
 	}
@@ -111,13 +126,21 @@ Item {
 	Loader {
 		id: editor
 		x: row.labelWidth + Theme.spacing
-		width: row.width - x - (resetter.visible ? resetter.width + 2 : 0)
+		width: row.width - x - (resetter.visible ? resetter.width + 2 : 0) - (unitLabel.visible ? unitLabel.width + 4 : 0)
 		enabled: row.editable
 		Component.onCompleted: source = Qt.binding(() => row.editorUrl())
 		onLoaded: {
 			item.row = row
 			item.width = Qt.binding(() => editor.width)
 		}
+	}
+	OrlexLabel {
+		id: unitLabel
+		visible: row.unit !== ""
+		anchors.right: resetter.visible ? resetter.left : parent.right
+		height: Theme.controlHeight
+		text: row.unit
+		enabled: row.editable
 	}
 	OrlexButton {
 		id: resetter

@@ -8,6 +8,7 @@ Column {
 	property var model: null
 	property bool advanced: false
 	property int labelWidth: 100
+	property var hints: ({})
 	property int generation: 0
 	property int shownCount: 0
 
@@ -68,6 +69,7 @@ Column {
 					parameterIndex: entry.parameterIndex
 					groupModel: section.model
 					labelWidth: section.labelWidth
+					hint: section.hints[entry.parameter.name] || ({})
 					generation: section.generation
 				}
 			}

@@ -9,6 +9,9 @@ FocusScope {
 
 	property var model: null
 	property int labelWidth: 100
+	// By a parameter's name, what it does not tell itself: {unit, check}. "check" gets what was typed and returns why it
+	// is refused, or an empty text.
+	property var hints: ({})
 	property alias advancedShown: fold.checked
 	property int generation: 0
 
@@ -32,6 +35,7 @@ FocusScope {
 			width: parent.width
 			model: view.model
 			labelWidth: view.labelWidth
+			hints: view.hints
 			generation: view.generation
 		}
 		OrlexDisclosure {
@@ -45,6 +49,7 @@ FocusScope {
 			width: parent.width
 			model: view.model
 			labelWidth: view.labelWidth
+			hints: view.hints
 			generation: view.generation
 			advanced: true
 			visible: fold.checked && shownCount > 0

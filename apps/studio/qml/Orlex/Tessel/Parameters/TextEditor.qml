@@ -10,10 +10,15 @@ Item {
 	property var row
 	readonly property string valueText: row ? row.valueText : ""
 	property bool edited: false
+	// Six digits tell enough until the field is typed into.
+	readonly property string shortText: {
+		const rounded = row && row.numeric && valueText !== "" ? Number(Number(valueText).toPrecision(6)) : NaN
+		return isNaN(rounded) || String(rounded).length >= valueText.length ? valueText : String(rounded)
+	}
 
 	function restore() {
 		edited = false
-		field.text = Qt.binding(() => valueText)
+		field.text = Qt.binding(() => field.activeFocus ? valueText : shortText)
 		showEnd()
 	}
 	function commit() {
@@ -49,8 +54,11 @@ Item {
 		error: editor.row ? editor.row.error : ""
 		placeholderText: editor.row && !editor.row.parameter.hasValue ? editor.row.defaultText : ""
 		Accessible.name: editor.row ? editor.row.label : ""
+		toolTip: editor.shortText !== editor.valueText ? editor.valueText : ""
 		onTextEdited: {
 			editor.edited = true
+			// What is typed stays until it is taken, wherever the keyboard goes.
+			text = text
 			editor.row.error = ""
 		}
 		onEditingFinished: {
