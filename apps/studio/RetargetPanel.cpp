@@ -172,16 +172,51 @@ bool VRetargetPanel::SetParameter(const char* i_pName, const QString& i_rPath)
 	return true;
 }
 
-void VRetargetPanel::Save()
+const QAbstractItemModel* VRetargetPanel::Model(const char* i_pName) const
 {
-	if (!m_pRoot)
-		return;
-	// Without a file the panel asks for one.
-	QObject* const pDialog = m_pRoot->findChild<QObject*>(QStringLiteral("saveDialog"));
-	if (!CurrentFile().isEmpty())
-		QMetaObject::invokeMethod(m_pRoot, "save");
+	const auto* const pPanel = qobject_cast<NVX::IQuickWidget*>(m_pWidget.data());
+	return pPanel ? qobject_cast<QAbstractItemModel*>(pPanel->contextProperty(QLatin1String(i_pName)).value<QObject*>())
+	              : nullptr;
+}
+
+QString VRetargetPanel::CurrentFile() const
+{
+	return m_pRoot ? m_pRoot->property(c_pCurrentFile).toUrl().toLocalFile() : QString();
+}
+
+bool VRetargetPanel::IsCurrentFileReadOnly() const
+{
+	return CurrentFile().endsWith(QStringLiteral(".qrx"));
+}
+
+QString VRetargetPanel::WhyNotSave() const
+{
+	const QAbstractItemModel* const pSegments = Model("TargetSegmentModel");
+	return pSegments && pSegments->rowCount() > 0 ? QString() : tr("there is no target subject yet");
+}
+
+void VRetargetPanel::New()
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(m_pDocument, "NewTargetSubject");
+}
+
+void VRetargetPanel::SaveAs()
+{
+	QObject* const pDialog = m_pRoot ? m_pRoot->findChild<QObject*>(QStringLiteral("saveDialog")) : nullptr;
+	if (!WhyNotSave().isEmpty())
+		TellIgnored(QStringLiteral("SaveTargetSubjectURL"), tr("There is no target subject yet."));
 	else if (pDialog)
 		QMetaObject::invokeMethod(pDialog, "open");
+}
+
+void VRetargetPanel::Save()
+{
+	// Without a file the panel asks for one.
+	if (!CurrentFile().isEmpty())
+		QMetaObject::invokeMethod(m_pRoot, "save");
+	else
+		SaveAs();
 }
 
 void VRetargetPanel::SaveTo(const QString& i_rPath)
@@ -195,16 +230,6 @@ void VRetargetPanel::ApplyTyped()
 {
 	if (m_pRoot)
 		QMetaObject::invokeMethod(m_pRoot, "commitEdits");
-}
-
-QString VRetargetPanel::CurrentFile() const
-{
-	return m_pRoot ? m_pRoot->property(c_pCurrentFile).toUrl().toLocalFile() : QString();
-}
-
-bool VRetargetPanel::IsCurrentFileReadOnly() const
-{
-	return CurrentFile().endsWith(QStringLiteral(".qrx"));
 }
 
 bool VRetargetPanel::HasUnsavedChanges() const
@@ -227,10 +252,7 @@ std::vector<NVX::ISelectionItem> VRetargetPanel::ItemsNamedIn(const QString& i_r
 	std::vector<NVX::ISelectionItem> items;
 	const auto take = [&](const char* i_pModel, const auto& i_IsNamed)
 	{
-		const auto* const pPanel = qobject_cast<NVX::IQuickWidget*>(m_pWidget.data());
-		const auto* const pModel = pPanel
-		    ? qobject_cast<QAbstractItemModel*>(pPanel->contextProperty(QLatin1String(i_pModel)).value<QObject*>())
-		    : nullptr;
+		const QAbstractItemModel* const pModel = Model(i_pModel);
 		if (!pModel)
 			return;
 		const QHash<int, QByteArray> roles = pModel->roleNames();

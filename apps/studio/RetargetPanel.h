@@ -12,6 +12,7 @@
 #include <memory>
 #include <vector>
 
+class QAbstractItemModel;
 class QWidget;
 
 namespace TesselPluginInterface
@@ -49,6 +50,15 @@ public:
 	/// What is being typed reaches the target subject.
 	void ApplyTyped();
 
+	/// The panel asks for the file.
+	void SaveAs();
+
+	/// Begins without a target subject and without a file; performer and character stay.
+	void New();
+
+	/// Empty if there is a target subject.
+	QString WhyNotSave() const;
+
 	/// The target subject would be lost. What is being typed does not count.
 	bool HasUnsavedChanges() const;
 
@@ -83,6 +93,8 @@ private:
 
 	bool SetParameter(const char* i_pName, const QString& i_rPath);
 	void FollowRootItem();
+	/// A list that the panel shows to its QML; null if there is none.
+	const QAbstractItemModel* Model(const char* i_pName) const;
 	/// Where a file of this kind stands, in pixels of the panel; empty for nowhere.
 	QRectF PlaceOf(EFileKind i_Kind) const;
 

@@ -12,12 +12,23 @@
 #include "studio/Services.h"
 
 #include <QAction>
+#include <QDialog>
 #include <QDockWidget>
+#include <QFile>
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QMenu>
 #include <QMenuBar>
 #include <QMessageBox>
+#include <QTextBrowser>
+#include <QVBoxLayout>
+
+#include <tuple>
+
+static void InitialiseResources()
+{
+	Q_INIT_RESOURCE(Help);
+}
 
 namespace StudioHost
 {
@@ -79,6 +90,15 @@ void VStudioWindow::MakeMenus(bool i_bDeveloper)
 void VStudioWindow::MakeFileMenu()
 {
 	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&File")), "FileMenu", tr("File"));
+	const auto withPanel = [this](void (VRetargetPanel::*i_pCommand)())
+	{
+		return [this, i_pCommand]
+		{
+			if (m_pRetargetPanel)
+				(m_pRetargetPanel.get()->*i_pCommand)();
+		};
+	};
+	AddAction(rMenu, "New", tr("&New Retarget Subject"), QKeySequence::New, withPanel(&VRetargetPanel::New));
 	for (const VOpenRow& rRow : c_OpenRows)
 		AddAction(rMenu, rRow.m_pName, tr(rRow.m_pText), QKeySequence(rRow.m_pShortcut),
 		    [this, kind = int(rRow.m_Kind)] { AskAndOpen(kind); });
@@ -86,12 +106,17 @@ void VStudioWindow::MakeFileMenu()
 	connect(m_pRecentFiles.get(), &VRecentFiles::changed, this, &VStudioWindow::UpdateRecentFiles);
 	UpdateRecentFiles();
 	rMenu.addSeparator();
-	AddAction(rMenu, "Save", tr("&Save Retarget Subject"), QKeySequence::Save,
+	// Off only while the menu shows it: the shortcut tells why nothing was saved.
+	connect(&rMenu, &QMenu::aboutToShow, this, &VStudioWindow::UpdateSaveActions);
+	connect(&rMenu, &QMenu::aboutToHide, this,
 	    [this]
 	    {
-		    if (m_pRetargetPanel)
-			    m_pRetargetPanel->Save();
+		    for (const char* const pName : {"New", "Save", "SaveAs"})
+			    findChild<QAction*>(QLatin1String(pName))->setEnabled(true);
 	    });
+	AddAction(rMenu, "Save", tr("&Save Retarget Subject"), QKeySequence::Save, withPanel(&VRetargetPanel::Save));
+	AddAction(rMenu, "SaveAs", tr("Save Retarget Subject &As..."), QKeySequence(QStringLiteral("Ctrl+Shift+S")),
+	    withPanel(&VRetargetPanel::SaveAs));
 	rMenu.addSeparator();
 	AddAction(rMenu, "PreferencesAction", tr("&Preferences..."), QKeySequence(QStringLiteral("Ctrl+,")),
 	    [this] { ShowPreferences(); });
@@ -118,8 +143,12 @@ void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
 
 void VStudioWindow::MakeHelpMenu()
 {
+	InitialiseResources();
 	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&Help")), "HelpMenu", tr("Help"));
-	AddAction(rMenu, "MouseAndKeys", tr("&Mouse and Keys"), QKeySequence::HelpContents, [this] { ShowMouseAndKeys(); });
+	AddAction(
+	    rMenu, "OperatorPage", tr("&Operator's Page"), QKeySequence::HelpContents, [this] { ShowOperatorPage(); });
+	AddAction(rMenu, "MouseAndKeys", tr("&Mouse and Keys"), QKeySequence(QStringLiteral("Shift+F1")),
+	    [this] { ShowMouseAndKeys(); });
 	AddAction(rMenu, "About", tr("&About"), {}, [this] { ShowAbout(); });
 }
 
@@ -207,6 +236,45 @@ void VStudioWindow::ShowMouseAndKeys()
 	    QMessageBox::NoIcon, tr("Mouse and keys"), text + QStringLiteral("</table>"), QMessageBox::Close, this);
 	Named(&box, "MouseAndKeysBox", tr("Mouse and keys"));
 	box.exec();
+}
+
+void VStudioWindow::UpdateSaveActions()
+{
+	const QString why = m_pRetargetPanel ? m_pRetargetPanel->WhyNotSave() : tr("no panel is open");
+	const QString file = m_pRetargetPanel ? m_pRetargetPanel->CurrentFile() : QString();
+	const std::tuple<const char*, QString, QString> rows[] = {{"New", tr("&New Retarget Subject"), {}},
+	    {"Save", tr("&Save Retarget Subject"), file.isEmpty() ? tr("asks for a name") : QFileInfo(file).fileName()},
+	    {"SaveAs", tr("Save Retarget Subject &As..."), {}}};
+	for (const auto& [pName, rText, rNote] : rows)
+	{
+		auto* const pAction = findChild<QAction*>(QLatin1String(pName));
+		const QString note = why.isEmpty() ? rNote : why;
+		pAction->setText(
+		    note.isEmpty() ? rText : QStringLiteral("%1 (%2)").arg(rText, QString(note).replace('&', "&&")));
+		pAction->setEnabled(why.isEmpty());
+	}
+}
+
+void VStudioWindow::ShowOperatorPage()
+{
+	if (auto* const pShown = findChild<QDialog*>(QStringLiteral("OperatorPageWindow")))
+	{
+		pShown->raise();
+		return pShown->activateWindow();
+	}
+	// Beside the work, not instead of it.
+	auto* const pDialog = Named(new QDialog(this), "OperatorPageWindow", tr("The operator's page"));
+	pDialog->setAttribute(Qt::WA_DeleteOnClose);
+	pDialog->setWindowTitle(tr("Operator's Page"));
+	auto* const pText = Named(new QTextBrowser, "OperatorPageText", tr("The operator's page"));
+	QFile file(QStringLiteral(":/help/operator.md"));
+	if (file.open(QIODevice::ReadOnly))
+		pText->setMarkdown(QString::fromUtf8(file.readAll()));
+	auto* const pLayout = new QVBoxLayout(pDialog);
+	pLayout->setContentsMargins(0, 0, 0, 0);
+	pLayout->addWidget(pText);
+	pDialog->resize(640, 720);
+	pDialog->show();
 }
 
 void VStudioWindow::ShowAbout()

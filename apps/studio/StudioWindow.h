@@ -68,7 +68,10 @@ private:
 	void UpdateRecentFiles();
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
+	void ShowOperatorPage();
 	void ShowAbout();
+	/// Names what "Save" would write, or why it is off.
+	void UpdateSaveActions();
 	/// Selects the segments and the target that a message is about; nothing changes if it names none.
 	void SelectNamedIn(const QString& i_rMessage);
 	void Say(const QString& i_rText);

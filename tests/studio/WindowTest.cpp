@@ -30,6 +30,7 @@
 #include <QQuickWindow>
 #include <QTableView>
 #include <QTest>
+#include <QTextBrowser>
 #include <QTimer>
 
 #include <functional>
@@ -256,6 +257,39 @@ TEST_F(Window, SelectsWhatAMessageIsAbout)
 		EXPECT_EQ(selected(NVX::ESelectionTargetSegment), rRow.m_Segments) << rRow.m_pMessage;
 		EXPECT_EQ(selected(NVX::ESelectionTarget), rRow.m_Targets) << rRow.m_pMessage;
 	}
+}
+
+TEST_F(Window, TheMenuTellsWhatSaveDoes)
+{
+	LoadPanel();
+	const auto shown = [this](const char* i_pName)
+	{
+		QMenu& rMenu = *m_pWindow->findChild<QMenu*>("FileMenu");
+		emit rMenu.aboutToShow();
+		const QString text = Action(i_pName).text() + (Action(i_pName).isEnabled() ? "" : " off");
+		emit rMenu.aboutToHide();
+		EXPECT_TRUE(Action(i_pName).isEnabled()) << "its shortcut tells why";
+		return text;
+	};
+	EXPECT_EQ(shown("Save"), "&Save Retarget Subject (there is no target subject yet) off");
+	Action("Save").trigger();
+	EXPECT_EQ(m_Messages.Take(), "3 Command: Save: There is no target subject yet.");
+	const QString target = Path("performer.qrr");
+	ASSERT_TRUE(QFile::copy(c_Source, target));
+	m_pWindow->Open(target);
+	RunEvents();
+	EXPECT_EQ(shown("Save"), "&Save Retarget Subject (performer.qrr)");
+	EXPECT_EQ(shown("SaveAs"), "Save Retarget Subject &As...");
+	Action("New").trigger();
+	RunEvents();
+	EXPECT_TRUE(m_pWindow->RetargetPanel()->CurrentFile().isEmpty());
+	EXPECT_FALSE(m_pWindow->RetargetPanel()->HasUnsavedChanges());
+	EXPECT_EQ(shown("New"), "&New Retarget Subject (there is no target subject yet) off");
+
+	Action("OperatorPage").trigger();
+	const auto* const pPage = m_pWindow->findChild<QTextBrowser*>("OperatorPageText");
+	ASSERT_TRUE(pPage && pPage->isVisible());
+	EXPECT_TRUE(pPage->toPlainText().contains("A good bind pose"));
 }
 
 TEST_F(Window, SaysWhyThereIsNoPanel)

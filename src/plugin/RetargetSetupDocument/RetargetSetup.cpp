@@ -277,10 +277,9 @@ void VRetargetSetup::Publish()
 
 	if (auto pSource = SourceValues().m_pParametrised)
 		m_pSourceSegmentModel->SetSubject(std::move(pSource));
-	if (const auto pTarget = TargetValues().m_pParametrised)
-	{
-		m_pTargetSegmentModel->SetSubject(pTarget);
-		m_pTargetModel->SetSubject(pTarget);
-	}
+	static const auto s_pNone = std::make_shared<const VSubjectParametrised>();
+	const auto pTarget = TargetValues().m_pParametrised;
+	m_pTargetSegmentModel->SetSubject(pTarget ? pTarget : s_pNone);
+	m_pTargetModel->SetSubject(pTarget ? pTarget : s_pNone);
 	m_ChangedSignal.Fire();
 }

@@ -63,6 +63,8 @@ public:
 	/// Makes the target subject anew from the FBX skeleton, from the root bone on and with the target scale. Targets,
 	/// joint edits and bind poses of the one before are lost. It is of no file.
 	Q_INVOKABLE void CreateTargetSubject();
+	/// Takes the target subject away, as it is before the first one.
+	Q_INVOKABLE void NewTargetSubject();
 	Q_INVOKABLE void LoadTargetSubjectURL(const QUrl& i_rFileURL);
 	Q_INVOKABLE void SaveTargetSubjectURL(const QUrl& i_rFileURL);
 

@@ -202,6 +202,20 @@ void VRetargetSetup::CreateTargetSubject()
 	emit targetSubjectCreated();
 }
 
+void VRetargetSetup::NewTargetSubject()
+{
+	constexpr const char* c_Command = "NewTargetSubject";
+	if (!TargetValues().m_pParametrised)
+		return Ignore(c_Command, Ignored::c_NoTarget);
+	if (!MayReplaceTarget(c_Command, "New Retarget Subject"))
+		return;
+	m_TargetItems = {};
+	m_TargetExtras = {};
+	m_SavedTarget = {};
+	m_MadeTarget = {};
+	Publish();
+}
+
 bool VRetargetSetup::LoadSourceSubject(const boost::filesystem::path& i_rPath, const std::string& i_rSkinName)
 {
 	VSubjectParametrised subject;
