@@ -23,4 +23,9 @@ bool VApplicationObject::MayReplaceTargetSubject(const std::string& i_rAction)
 	return !m_AskToReplace || m_AskToReplace(i_rAction);
 }
 
+bool VApplicationObject::MayOverwriteChangedFile(const std::string& i_rPath)
+{
+	return !m_AskToOverwrite || m_AskToOverwrite(i_rPath);
+}
+
 } // namespace StudioHost

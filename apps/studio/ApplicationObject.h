@@ -19,9 +19,11 @@ public:
 
 	TesselPluginInterface::VHostRules Rules() const override;
 	bool MayReplaceTargetSubject(const std::string& i_rAction) override;
+	bool MayOverwriteChangedFile(const std::string& i_rPath) override;
 
 	/// Asks whoever sits at the window; until it is set the answer is yes.
 	std::function<bool(const std::string& i_rAction)> m_AskToReplace;
+	std::function<bool(const std::string& i_rPath)> m_AskToOverwrite;
 
 private:
 	const std::shared_ptr<const VPreferences> m_pPreferences;

@@ -1,6 +1,7 @@
 #include "studio/StudioWindow.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "studio/ApplicationObject.h"
 #include "studio/FileDrop.h"
 #include "studio/LogModel.h"
 #include "studio/LogPanel.h"
@@ -20,6 +21,7 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QMessageBox>
+#include <QPushButton>
 #include <QTimer>
 
 namespace StudioHost
@@ -47,6 +49,8 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	Named(this, "StudioWindow", tr("Retarget Studio"));
 	setWindowTitle(c_Title);
 	setAcceptDrops(true);
+	std::dynamic_pointer_cast<VApplicationObject>(m_pContext->GetApplicationObject())->m_AskToOverwrite =
+	    [this](const std::string& i_rPath) { return MayOverwrite(i_rPath); };
 	new VFileDrop(
 	    *this,
 	    [this](const QStringList& i_rFiles)
@@ -237,6 +241,18 @@ void VStudioWindow::UpdateTitle()
 	file.replace(QStringLiteral("[*]"), QStringLiteral("[*][*]"));
 	setWindowTitle(file.isEmpty() ? c_Title : QStringLiteral("%1[*] - %2").arg(file, c_Title));
 	setWindowModified(bUnsaved);
+}
+
+bool VStudioWindow::MayOverwrite(const std::string& i_rPath)
+{
+	QMessageBox box(QMessageBox::Warning, windowTitle(),
+	    tr("%1 was changed by another program since it was last loaded or saved here. Overwrite it?")
+	        .arg(QString::fromStdString(i_rPath)),
+	    QMessageBox::Save | QMessageBox::Cancel, this);
+	Named(&box, "ChangedFile", box.text());
+	box.button(QMessageBox::Save)->setText(tr("&Overwrite"));
+	box.setDefaultButton(QMessageBox::Cancel);
+	return box.exec() == QMessageBox::Save;
 }
 
 void VStudioWindow::SelectNamedIn(const QString& i_rMessage)

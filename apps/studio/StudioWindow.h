@@ -72,6 +72,8 @@ private:
 	void ShowAbout();
 	/// Names what "Save" would write, or why it is off.
 	void UpdateSaveActions();
+	/// Asks before what another program has written is lost.
+	bool MayOverwrite(const std::string& i_rPath);
 	/// Selects the segments and the target that a message is about; nothing changes if it names none.
 	void SelectNamedIn(const QString& i_rMessage);
 	void Say(const QString& i_rText);

@@ -6,7 +6,9 @@
 #include <QMetaMethod>
 #include <QMetaProperty>
 
+#include <fstream>
 #include <functional>
+#include <iterator>
 #include <limits>
 #include <numbers>
 
@@ -357,6 +359,7 @@ struct VAskedHost : TesselPluginInterface::IHostRules
 		m_Meanwhile();
 		return m_bAnswer;
 	}
+	bool MayOverwriteChangedFile(const std::string& i_rPath) override { return MayReplaceTargetSubject(i_rPath); }
 
 	TesselPluginInterface::VHostRules m_Rules;
 	std::string m_Asked;
@@ -443,6 +446,35 @@ TEST_F(Document, AHostMayWantEachPairOnce)
 	EXPECT_EQ(log.Take(), "3 RetargetSetup: There is a target 'LeftArm>arm_l' already: only the other side is added");
 	EXPECT_EQ(add(2, true, true), 5u) << "both sides are there";
 	EXPECT_EQ(told, "There is a target 'RightArm>arm_r' already.found 4;");
+}
+
+TEST_F(Document, AsksItsHostBeforeAChangedFileIsOverwritten)
+{
+	const auto pHost = std::make_shared<VAskedHost>();
+	const boost::filesystem::path file = m_Folder / "a.qrr";
+	const QUrl url = QUrl::fromLocalFile(QString::fromStdString(file.string()));
+	const auto write = [&file](const char* i_pText) { std::ofstream(file.string()) << i_pText; };
+	const auto holds = [&file](const std::string& i_rText)
+	{ return std::string(std::istreambuf_iterator<char>(std::ifstream(file.string()).rdbuf()), {}) == i_rText; };
+	SetSmallSubjects();
+	write("another asset");
+	m_Document.SaveTargetSubjectURL(url);
+	m_Document.SetHostRules(pHost);
+	m_Document.SaveTargetSubjectURL(url);
+	EXPECT_EQ(pHost->m_Asked, "") << "it holds what was saved";
+	write("of another program");
+	pHost->m_bAnswer = false;
+	m_Document.SaveTargetSubjectURL(url);
+	EXPECT_EQ(pHost->m_Asked, file.string() + ";");
+	EXPECT_TRUE(holds("of another program"));
+	pHost->m_bAnswer = true;
+	m_Document.SaveTargetSubjectURL(url);
+	EXPECT_FALSE(holds("of another program"));
+	boost::filesystem::remove(file);
+	pHost->m_Asked.clear();
+	m_Document.SaveTargetSubjectURL(url);
+	EXPECT_EQ(pHost->m_Asked, "") << "nothing is lost where there is nothing";
+	EXPECT_TRUE(boost::filesystem::exists(file));
 }
 
 } // namespace

@@ -1,5 +1,6 @@
 // Parameters and document follow each other, and neither hears its own echo.
 
+#include "../WaitFor.h"
 #include "TestPanel.h"
 
 #include "OrlexGraphics/SkinCache.h"
@@ -338,6 +339,44 @@ TEST_F(Handlers, AFileThatGivesNothingIsToldWhileItIsChosen)
 	    std::string::npos);
 	Run();
 	EXPECT_EQ(m_pWidget->Remarks().toStdString(), "");
+}
+
+TEST_F(Handlers, AnFBXFileThatChangesOnDiskIsReadAgain)
+{
+	const auto put = [this](const std::string& i_rFile)
+	{
+		// As programs do that write beside the file and rename.
+		boost::filesystem::copy_file(i_rFile, m_Folder / "new.tmp");
+		boost::filesystem::rename(m_Folder / "new.tmp", m_Folder / "a.fbx");
+	};
+	put(c_DemoFBX);
+	m_Context.Folders().SetFolder("FolderSkins", m_Folder / "");
+	Open();
+	EXPECT_EQ(Type("TargetFBX", "a"), "");
+	EXPECT_EQ(Type("TargetRoot", "1"), "");
+	m_pDocument->CreateTargetSubject();
+	Run();
+	TakeLog();
+	for (int i = 0; i < 2; ++i)
+	{
+		const auto bones = Parameter("TargetRoot").GetEnumeration();
+		put(i == 0 ? RETARGET_TEST_DATA "/fbx/heaps_biped_zup_a7100.fbx" : c_DemoFBX);
+		std::string log;
+		EXPECT_TRUE(WaitFor(
+		    [&]
+		    {
+			    Run();
+			    log += TakeLog();
+			    return log.find("a.fbx' has changed on disk and was read again: ") != std::string::npos;
+		    },
+		    60000));
+		EXPECT_NE(log.find(i == 0 ? "'loin'" : "are new ('haunch', 'loin', 'ribs'"), std::string::npos) << log;
+		EXPECT_NE(log.find("The target subject stays as it was"), std::string::npos);
+		Run();
+		EXPECT_NE(Parameter("TargetRoot").GetEnumeration(), bones);
+		EXPECT_EQ(Text("TargetRoot"), "0") << "the bone is gone";
+		EXPECT_EQ(Target().m_Segments[0].m_Name, "loin");
+	}
 }
 
 TEST_F(Handlers, SourcesAreNeverLookedForWhereTheProcessRuns)

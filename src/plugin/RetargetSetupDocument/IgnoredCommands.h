@@ -25,6 +25,7 @@ inline constexpr const char* c_LaterVersion =
 inline constexpr const char* c_NotRead = "'%1' could not be loaded. The target subject is still the one before.";
 inline constexpr const char* c_LegacyOnlyRead =
     "Nothing was saved: '%1' is a legacy file, and those are only read. Choose a name that ends in .qrr.";
+inline constexpr const char* c_FileKept = "Nothing was saved: '%1' was changed by another program, and stays.";
 /// The reason is %2.
 inline constexpr const char* c_NotSaved = "Nothing was saved, and '%1' is as it was. %2";
 

@@ -13,6 +13,7 @@
 #include "TesselPluginInterface/IHostRules.h"
 #include "TesselPluginInterface/IItemFactory.h"
 
+#include <QByteArray>
 #include <QMatrix4x4>
 #include <QObject>
 #include <QUrl>
@@ -240,6 +241,11 @@ private:
 	/// False without a target subject.
 	bool TargetDiffersFrom(const VSubjectValues& i_rKept) const;
 
+	/// Keeps what the target subject's file holds from now on.
+	void RememberTargetFile(const boost::filesystem::path& i_rPath);
+	/// Asks the host before a change of another program is overwritten.
+	bool MayOverwrite(const boost::filesystem::path& i_rPath) const;
+
 	/// Emits commandIgnored.
 	void Ignore(const char* i_pCommand, const QString& i_rReason);
 
@@ -295,6 +301,9 @@ private:
 
 	/// What the file held when it was last loaded or saved.
 	VSubjectValues m_SavedTarget;
+	/// Where that file is, and a digest of what it held then; empty for no file.
+	boost::filesystem::path m_TargetFile;
+	QByteArray m_TargetFileDigest;
 	/// As CreateTargetSubject left it.
 	VSubjectValues m_MadeTarget;
 

@@ -17,6 +17,9 @@
 #include "RetargetSetupDocument/TargetConstruction.h"
 #include "UtilsFileSystem/Paths.h"
 
+#include <QCryptographicHash>
+#include <QFile>
+
 #include <algorithm>
 #include <cmath>
 #include <map>
@@ -85,6 +88,14 @@ template <typename T>
 bool Differ(const std::shared_ptr<const T>& i_rpA, const std::shared_ptr<const T>& i_rpB)
 {
 	return i_rpA != i_rpB && (!i_rpA || !i_rpB || !(*i_rpA == *i_rpB));
+}
+
+/// Of what a file holds; empty if it cannot be read.
+QByteArray DigestOf(const boost::filesystem::path& i_rPath)
+{
+	QFile file(QString::fromStdString(UtilsFileSystem::ToUtf8(i_rPath)));
+	QCryptographicHash digest(QCryptographicHash::Sha256);
+	return file.open(QIODevice::ReadOnly) && digest.addData(&file) ? digest.result() : QByteArray();
 }
 
 /// Reads the file that is about to be written, in memory, and tells what would not come back.
@@ -266,6 +277,7 @@ std::uint32_t VRetargetSetup::LoadTargetSubject(const boost::filesystem::path& i
 	m_SourceName = std::move(sourceName);
 	m_SavedTarget = TargetValues();
 	emit unsavedChangesChanged();
+	RememberTargetFile(i_rPath);
 	return NVX::Status::c_Success;
 }
 
@@ -295,6 +307,7 @@ std::uint32_t VRetargetSetup::Save(const boost::filesystem::path& i_rPath, std::
 	{
 		m_SavedTarget = target;
 		emit unsavedChangesChanged();
+		RememberTargetFile(i_rPath);
 	}
 	return status;
 }
@@ -305,6 +318,21 @@ bool VRetargetSetup::TargetDiffersFrom(const VSubjectValues& i_rKept) const
 	return target.m_pParametrised
 	    && (Differ(target.m_pParametrised, i_rKept.m_pParametrised)
 	        || Differ(target.m_pApplicationData, i_rKept.m_pApplicationData));
+}
+
+void VRetargetSetup::RememberTargetFile(const boost::filesystem::path& i_rPath)
+{
+	m_TargetFile = i_rPath;
+	m_TargetFileDigest = DigestOf(i_rPath);
+}
+
+bool VRetargetSetup::MayOverwrite(const boost::filesystem::path& i_rPath) const
+{
+	if (!m_pHostRules || i_rPath != m_TargetFile || m_TargetFileDigest.isEmpty())
+		return true;
+	const QByteArray now = DigestOf(i_rPath);
+	return now.isEmpty() || now == m_TargetFileDigest
+	    || m_pHostRules->MayOverwriteChangedFile(UtilsFileSystem::ToUtf8(i_rPath));
 }
 
 bool VRetargetSetup::HasUnsavedChanges() const
@@ -341,6 +369,8 @@ void VRetargetSetup::SaveTargetSubjectURL(const QUrl& i_rFileURL)
 		return Ignore(c_Command, QString(Ignored::c_NotLocal).arg(i_rFileURL.toDisplayString()));
 	if (RetargetSetup::FileExtension(path) == c_LegacyExtension)
 		return Ignore(c_Command, QString(Ignored::c_LegacyOnlyRead).arg(i_rFileURL.toLocalFile()));
+	if (!MayOverwrite(path))
+		return Ignore(c_Command, QString(Ignored::c_FileKept).arg(i_rFileURL.toLocalFile()));
 	if (const auto pApplicationData = TargetValues().m_pApplicationData)
 		TellSourceOfSaved(pApplicationData->m_RetargetSourceTemplate, m_ShownSourceName);
 	std::string reason;

@@ -17,6 +17,7 @@
 #include "TesselPluginRetargetSetup/RetargetSetupWidget.h"
 #include "UtilsFileSystem/Paths.h"
 
+#include <algorithm>
 #include <bit>
 #include <utility>
 
@@ -145,6 +146,7 @@ void VRetargetSetupWidget::OnTargetFBXChanged()
 		return;
 	}
 	RetargetSetup::VPanelParameters::OfferFile(*m_Parameters.m_pTargetFBX, path);
+	m_TargetFBXFile.Follow(QString::fromStdString(UtilsFileSystem::ToUtf8(path)));
 	if (!m_pRetargetSetup->LoadTargetFBX(path))
 	{
 		m_UnreadFBX = UtilsFileSystem::ToUtf8(path.filename());
@@ -165,6 +167,33 @@ void VRetargetSetupWidget::OnTargetFBXChanged()
 	m_AgreedRoot = 0;
 	m_pRetargetSetup->SetTargetRootIndex(0, false);
 	UpdateRemarks();
+}
+
+void VRetargetSetupWidget::OnTargetFBXWritten()
+{
+	const std::string file = m_Parameters.m_pTargetFBX->GetValueText();
+	const auto pBefore = m_pRetargetSetup->GetFBXSkeleton();
+	if (!m_pRetargetSetup->LoadTargetFBX(UtilsFileSystem::PathFromUtf8(file)))
+	{
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "'%1%' has changed on disk, and no skeleton can be read from it now",
+		    file);
+		return;
+	}
+	const auto pNow = m_pRetargetSetup->GetFBXSkeleton();
+	const std::string changes = pBefore ? RetargetSetup::BoneChanges(*pBefore, *pNow) : "all bones are new";
+	NVX_LOG(c_LogCategory, changes.empty() ? NVX::ELogInformation : NVX::ELogWarning,
+	    "'%1%' has changed on disk and was read again: %2%", file,
+	    changes.empty() ? "its bones are as they were"
+	                    : changes + ". The target subject stays as it was until it is created again.");
+	std::uint32_t root = 0;
+	m_Parameters.m_pTargetRoot->Get(root);
+	m_Parameters.SetBones(RetargetSetup::BoneListForEnum(*pNow));
+	// The root stays the same bone, wherever it stands now.
+	const auto found = pBefore && root < pBefore->size()
+	    ? std::ranges::find(*pNow, (*pBefore)[root].m_Name, &FBXIO::VSkinBone::m_Name)
+	    : pNow->end();
+	m_Parameters.m_pTargetRoot->Set(found == pNow->end() ? std::uint32_t(0) : std::uint32_t(found - pNow->begin()));
+	OnTargetRootChanged();
 }
 
 void VRetargetSetupWidget::OnTargetRootChanged()

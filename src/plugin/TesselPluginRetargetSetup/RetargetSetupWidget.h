@@ -2,6 +2,7 @@
 
 #include "OrlexQtQuick/QuickWidget.h"
 #include "TesselPluginInterface/ITesselExecuteCommand.h"
+#include "TesselPluginRetargetSetup/FollowedFile.h"
 #include "TesselPluginRetargetSetup/PanelParameters.h"
 
 #include <QPointer>
@@ -86,6 +87,8 @@ private:
 
 	void OnSourceSkeletonChanged();
 	void OnTargetFBXChanged();
+	/// Another program has written the file: its bones are read again, and the target subject stays.
+	void OnTargetFBXWritten();
 	void OnTargetRootChanged();
 	void OnTargetScaleChanged();
 	void OnTargetParametersChanged();
@@ -147,4 +150,5 @@ private:
 	QString m_Remarks;
 	std::optional<VChosenSource> m_ChosenSource;
 	std::optional<VLoadedSource> m_LoadedSource;
+	RetargetSetup::VFollowedFile m_TargetFBXFile{[this] { OnTargetFBXWritten(); }};
 };

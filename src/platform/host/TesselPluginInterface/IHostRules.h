@@ -39,6 +39,11 @@ public:
 	/// @param i_rAction what the operator wants to do, as the beginning of a sentence: "Create Target Subject".
 	/// @return false: the command ends with no change.
 	virtual bool MayReplaceTargetSubject(const std::string& i_rAction) = 0;
+
+	/// Called before a save overwrites the target subject's file, if that holds something else than what was last
+	/// loaded from it or saved to it. May show a dialog.
+	/// @return false: the file stays as it is.
+	virtual bool MayOverwriteChangedFile(const std::string& /*i_rPath*/) { return true; }
 };
 
 /// Null for a host that gives none.
