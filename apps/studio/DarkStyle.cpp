@@ -49,14 +49,18 @@ void ApplyDarkStyle(QApplication& io_rApplication)
 {
 	io_rApplication.setStyle(QStyleFactory::create(QStringLiteral("Fusion")));
 	io_rApplication.setPalette(DarkPalette());
-	io_rApplication.setStyleSheet(
-	    QStringLiteral("QToolTip { color: #d8dadd; background: #212427; border: 1px solid #555b62; padding: 3px; }"
-	                   "QDockWidget::title { background: #212427; padding: 5px; }"
-	                   "QTabBar::tab:selected { border-bottom: 2px solid %1; }"
-	                   "QMainWindow::separator { background: #212427; width: 4px; height: 4px; }"
-	                   "QMainWindow::separator:hover { background: %1; }"
-	                   "QLineEdit:focus, QComboBox:focus { border: 1px solid %1; }")
-	        .arg(c_Active.name()));
+	io_rApplication.setStyleSheet(QStringLiteral(
+	    "QToolTip { color: #d8dadd; background: #212427; border: 1px solid #555b62; padding: 3px; }"
+	    "QDockWidget::title { background: #212427; padding: 5px; }"
+	    "QTabWidget::pane { border: 1px solid #555b62; }"
+	    "QTabBar::tab { color: #c3c7cb; background: #212427; padding: 6px 14px; border: 1px solid #555b62;"
+	    " border-bottom: 2px solid #212427; }"
+	    "QTabBar::tab:hover { background: #34383c; }"
+	    "QTabBar::tab:selected { color: #ffffff; background: #2a2d30; border-bottom: 2px solid %1; }"
+	    "QMainWindow::separator { background: #212427; width: 4px; height: 4px; }"
+	    "QMainWindow::separator:hover { background: %1; }"
+	    "QLineEdit:focus, QComboBox:focus { border: 1px solid %1; }")
+	                                  .arg(c_Active.name()));
 }
 
 } // namespace StudioHost

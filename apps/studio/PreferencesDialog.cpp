@@ -18,10 +18,15 @@
 #include <QToolButton>
 #include <QVBoxLayout>
 
+#include <algorithm>
+
 namespace StudioHost
 {
 namespace
 {
+
+/// The first of EPathTypes: what this panel works with.
+constexpr std::size_t c_FoldersFirst = 4;
 
 constexpr const char* c_pProducts[] = {"Orlex Rally", "Orlex Stage"};
 
@@ -87,8 +92,32 @@ QWidget* VPreferencesDialog::FolderPage(
 	auto* const pIntroduction = new QLabel(i_rIntroduction);
 	pIntroduction->setWordWrap(true);
 	pLayout->addWidget(pIntroduction, 0, 0, 1, 4);
-	for (const auto& [rKey, rLabel] : i_rKeys)
-		AddFolderRow(*pLayout, rKey, rLabel);
+	const std::size_t count = std::min(i_rKeys.size(), c_FoldersFirst);
+	for (std::size_t i = 0; i < count; ++i)
+		AddFolderRow(*pLayout, i_rKeys[i].first, i_rKeys[i].second);
+	if (count < i_rKeys.size())
+	{
+		auto* const pRest = Named(new QWidget, "MoreFolders", tr("Folders that are seldom set"));
+		auto* const pRestLayout = new QGridLayout(pRest);
+		pRestLayout->setContentsMargins(0, 0, 0, 0);
+		pRestLayout->setColumnStretch(1, 1);
+		for (std::size_t i = count; i < i_rKeys.size(); ++i)
+			AddFolderRow(*pRestLayout, i_rKeys[i].first, i_rKeys[i].second);
+		pRest->hide();
+		auto* const pMore = Named(new QToolButton, "More", tr("More folders"));
+		pMore->setText(tr("More"));
+		pMore->setCheckable(true);
+		pMore->setToolButtonStyle(Qt::ToolButtonTextBesideIcon);
+		pMore->setArrowType(Qt::RightArrow);
+		connect(pMore, &QToolButton::toggled, pRest,
+		    [pMore, pRest](bool i_bShown)
+		    {
+			    pMore->setArrowType(i_bShown ? Qt::DownArrow : Qt::RightArrow);
+			    pRest->setVisible(i_bShown);
+		    });
+		pLayout->addWidget(pMore, pLayout->rowCount(), 0);
+		pLayout->addWidget(pRest, pLayout->rowCount(), 0, 1, 4);
+	}
 	pLayout->setRowStretch(pLayout->rowCount(), 1);
 	pLayout->setColumnStretch(1, 1);
 	return pPage;

@@ -56,14 +56,15 @@ struct VCommandRow
 {
 	const char* m_pName;
 	const char* m_pText;
-	const char* m_pShortcut;
+	/// Separated by blanks.
+	const char* m_pShortcuts;
 	const char* m_pCommand;
 };
 
 constexpr VCommandRow c_CommandRows[] = {
     {"FrameSelected", QT_TRANSLATE_NOOP("Studio", "&Frame Selected"), "Ctrl+F", "Workspace3d:FrameSelected"},
-    {"ScaleUpManipulator", QT_TRANSLATE_NOOP("Studio", "&Larger Manipulator"), "Ctrl++",
-        "Workspace3d:ScaleUpManipulator"},
+    {"ScaleUpManipulator", QT_TRANSLATE_NOOP("Studio", "&Larger Manipulator"),
+        "Ctrl++ Ctrl+=", "Workspace3d:ScaleUpManipulator"},
     {"ScaleDownManipulator", QT_TRANSLATE_NOOP("Studio", "&Smaller Manipulator"), "Ctrl+-",
         "Workspace3d:ScaleDownManipulator"}};
 
@@ -128,8 +129,14 @@ void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
 {
 	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&View")), "ViewMenu", tr("View"));
 	for (const VCommandRow& rRow : c_CommandRows)
-		AddAction(rMenu, rRow.m_pName, tr(rRow.m_pText), QKeySequence(rRow.m_pShortcut),
-		    [this, pCommand = rRow.m_pCommand] { Execute(QLatin1String(pCommand)); });
+	{
+		QList<QKeySequence> shortcuts;
+		for (const QString& rShortcut : QString(rRow.m_pShortcuts).split(' '))
+			shortcuts << QKeySequence(rShortcut);
+		AddAction(rMenu, rRow.m_pName, tr(rRow.m_pText), {},
+		    [this, pCommand = rRow.m_pCommand] { Execute(QLatin1String(pCommand)); })
+		    ->setShortcuts(shortcuts);
+	}
 	rMenu.addSeparator();
 	m_pPanelMenu = Named(rMenu.addMenu(tr("&Panels")), "PanelMenu", tr("Panels"));
 	m_pPanelMenu->addAction(m_pLogDock->toggleViewAction());

@@ -33,6 +33,7 @@
 #include <QTextBrowser>
 #include <QTimer>
 
+#include <algorithm>
 #include <functional>
 
 namespace
@@ -443,6 +444,16 @@ TEST_F(Window, PreferencesHaveARowForEachFolder)
 	keys.insert(keys.end(), {"ProductFolderOrlexRally", "ProductFolderOrlexStage"});
 	{
 		VPreferencesDialog dialog(rPreferences);
+		dialog.show();
+		const auto count = [&dialog, &keys]
+		{
+			return std::ranges::count_if(keys,
+			    [&dialog](const std::string& i_rKey)
+			    { return dialog.findChild<QLineEdit*>(QString::fromStdString(i_rKey))->isVisible(); });
+		};
+		EXPECT_EQ(count(), 4) << "those that count";
+		QTest::mouseClick(dialog.findChild<QAbstractButton*>("More"), Qt::LeftButton);
+		EXPECT_EQ(count(), 11);
 		for (const std::string& rKey : keys)
 		{
 			auto* const pEdit = dialog.findChild<QLineEdit*>(QString::fromStdString(rKey));

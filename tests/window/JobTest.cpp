@@ -103,7 +103,8 @@ TEST_F(Job, TheWholeJob)
 	const QByteArray saved = CommandLine(edits);
 	EXPECT_EVENTUALLY(Content("job.qrr") == saved);
 
-	rOperator.Click("removeTarget");
+	rOperator.ClickRow("targets", 0);
+	rOperator.Key(Qt::Key_Delete);
 	EXPECT_EVENTUALLY(Targets() == 5);
 	EXPECT_EVENTUALLY(rOperator.Property("unsavedMark", "visible").toBool());
 	rOperator.AnswerNextQuestion("job.qrr has changes that are not saved.", QMessageBox::Discard);

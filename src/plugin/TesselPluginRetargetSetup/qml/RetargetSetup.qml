@@ -439,6 +439,7 @@ Rectangle {
 					RetargetSetupTargetTable {
 						objectName: "targets"
 						Layout.fillWidth: true
+						Keys.onDeletePressed: if (removeTarget.enabled) removeTarget.act()
 						emptyText: targetSegments.count === 0
 							? "Choose a source skeleton and a target FBX above, then create the target subject."
 							: sourceSegments.count === 0 ? "Choose a source skeleton above."
@@ -450,6 +451,7 @@ Rectangle {
 					}
 
 					OrlexButton {
+						id: removeTarget
 						objectName: "removeTarget"
 						Layout.fillWidth: true
 						text: "Remove target"
