@@ -1,9 +1,11 @@
 #include "retarget/Commands.h"
 #include "retarget/Edits.h"
+#include "retarget/Messages.h"
 #include "retarget/OutputFile.h"
 #include "retarget/Session.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "RetargetSetupDocument/FilePose.h"
 
 namespace CommandLine
 {
@@ -26,9 +28,10 @@ EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 	if (!i_rSettings.m_Source.empty())
 		session.LoadSource(i_rSettings.m_Source);
 	session.CreateTarget(i_rSettings.m_Fbx, i_rSettings.m_Root);
-	if (const auto worst = DifferenceFromFile(session))
-		TellDifferenceFromFile(
-		    session, *worst, NVX::ELogWarning, "The bind pose as built", "; --match-file-pose mends it");
+	if (const auto worst = session.Document().DifferenceFromFile())
+		NVX_LOG(c_pCategory, NVX::ELogWarning,
+		    "The bind pose as built differs from the pose in the file, %1%; --match-file-pose mends it",
+		    RetargetSetup::WorstText(session.Target(), *worst));
 	ApplyEdits(session, i_rEdits);
 	session.Save(i_rSettings.m_Out.m_Path);
 	session.Report(i_rSettings.m_Out.m_Path);

@@ -6,7 +6,6 @@
 
 #include "CoreOrlexTypes/JointType.h"
 #include "DebugServices/GlobalLog.h"
-#include "RetargetSetupDocument/FilePose.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
 #include "RetargetSetupDocument/SideOfName.h"
 #include "math/NumberText.h"
@@ -223,23 +222,9 @@ void ForgetPoseWarnings()
 
 void MatchFilePose(VSession& io_rSession, const std::string&)
 {
-	const VCharacterFile& rFile = *io_rSession.File();
-	VSubjectParametrised subject = io_rSession.Target();
-	const RetargetSetup::VFileMatch match = RetargetSetup::MatchFilePose(subject, rFile.m_Bones, rFile.m_Axis);
-	io_rSession.Document().SetTargetSubjectParametrised(subject);
+	io_rSession.Document().MatchFilePose();
 	io_rSession.m_bMatched = true;
 	ForgetPoseWarnings();
-	if (!match.m_Lengths.empty())
-		NVX_LOG(c_pCategory, NVX::ELogInformation, "--match-file-pose: %1% segments got the file's lengths",
-		    match.m_Lengths.size());
-	if (!match.m_PreRotations.empty())
-		NVX_LOG(c_pCategory, NVX::ELogInformation, "--match-file-pose: %1% segments without a joint were turned",
-		    match.m_PreRotations.size());
-	// What lengths within a thousandth of the file's add up to is no concern.
-	if (const auto worst = DifferenceFromFile(io_rSession))
-		TellDifferenceFromFile(io_rSession, *worst,
-		    worst->m_Distance > 1.0 || worst->m_Angle > 1e-3 ? NVX::ELogWarning : NVX::ELogInformation,
-		    "After --match-file-pose the bind pose", "");
 }
 
 void UpdateTargets(VSession& io_rSession, const std::string&)

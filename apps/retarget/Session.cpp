@@ -12,13 +12,11 @@
 #include "InMemoryHost/Flow.h"
 #include "NVX/Status.h"
 #include "RetargetSetupDocument/BindPose.h"
-#include "RetargetSetupDocument/FilePose.h"
 #include "RetargetSetupDocument/TargetConstruction.h"
 
 #include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
-#include <numbers>
 
 namespace CommandLine
 {
@@ -90,15 +88,10 @@ void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std:
 		throw VCommandError(EBadInput,
 		    "\"" + i_rPath + "\" could be read only in part: " + std::to_string(pSkeleton->size())
 		        + " bones up to where it broke off");
-	std::size_t root = 0;
 	if (i_rRoot)
-	{
-		root = FindRoot(*i_rRoot, *pSkeleton);
-		m_pDocument->SetTargetRootIndex(std::uint32_t(root));
-	}
+		m_pDocument->SetTargetRootIndex(std::uint32_t(FindRoot(*i_rRoot, *pSkeleton)));
 	m_pDocument->CreateTargetSubject();
 	Settle();
-	m_File = {RetargetSetup::ExtractSubtree(*pSkeleton, root), m_pDocument->GetTargetAxisMatrix()};
 }
 
 void VSession::Report(const std::string& i_rPath) const
@@ -155,23 +148,6 @@ std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectV
 {
 	const auto pFK = RetargetSetup::KinematicsInBindPose(*i_rValues.m_pParametrised, *i_rValues.m_pSubject, i_pWhich);
 	return pFK ? RetargetSetup::SegmentPoses(*pFK) : std::vector<Rotation::VPose<double>>();
-}
-
-std::optional<RetargetSetup::VPoseDifference> DifferenceFromFile(VSession& io_rSession)
-{
-	const VCharacterFile& rFile = *io_rSession.File();
-	return RetargetSetup::WorstPoseDifference(
-	    RetargetSetup::PosesInFile(rFile.m_Bones, rFile.m_Axis, io_rSession.Document().GetTargetScale()),
-	    BindPosesOf(io_rSession.Document().TargetValues(), "target"));
-}
-
-void TellDifferenceFromFile(VSession& io_rSession, const RetargetSetup::VPoseDifference& i_rWorst, int i_Level,
-    const char* i_pWhat, const char* i_pHint)
-{
-	NVX_LOG(c_pCategory, i_Level,
-	    "%1% differs from the pose in the file, at worst \"%2%\" by %3$.1f mm and %4$.1f degrees%5%", i_pWhat,
-	    io_rSession.Target().m_Segments[i_rWorst.m_SegmentIndex].m_Name, i_rWorst.m_Distance,
-	    i_rWorst.m_Angle * 180.0 / std::numbers::pi, i_pHint);
 }
 
 } // namespace CommandLine

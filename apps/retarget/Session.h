@@ -2,14 +2,10 @@
 
 #include "retarget/Elements.h"
 
-#include "FBXIO/SkinSkeleton.h"
 #include "InMemoryHost/Application.h"
 #include "InMemoryHost/Dispatcher.h"
-#include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "numerics/Rotation.h"
-
-#include <QMatrix4x4>
 
 #include <memory>
 #include <optional>
@@ -19,15 +15,6 @@
 
 namespace CommandLine
 {
-
-/// The FBX file that a target subject was made of.
-struct VCharacterFile
-{
-	/// The chosen root and all below it, in the order of the segments.
-	FBXIO::VSkinSkeleton m_Bones;
-	/// Turns the file's space into the system's Z-up space.
-	QMatrix4x4 m_Axis;
-};
 
 /// The document with host services in memory. Operations throw VCommandError to fail.
 class VSession
@@ -63,9 +50,6 @@ public:
 	const CoreOrlexTypes::VSubjectParametrised& Source(const std::string& i_rWhatFor) const;
 	const CoreOrlexTypes::VSubjectParametrised& Target() const;
 
-	/// Where the target subject was made here.
-	const std::optional<VCharacterFile>& File() const { return m_File; }
-
 	/// Whether targets that are added get a mirrored partner; off at first, as in the panel.
 	bool m_bSymmetry = false;
 	/// Segments that are each other's partner whatever their names say, by index; the last one counts.
@@ -82,18 +66,10 @@ private:
 	std::shared_ptr<InMemoryHost::VApplication> m_pApplication;
 	std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher;
 	std::shared_ptr<VRetargetSetup> m_pDocument;
-	std::optional<VCharacterFile> m_File;
 };
 
 /// World poses of all segments of a subject in its bind pose, in mm; empty, which is told, if it has no
 /// kinematics.
 std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectValues& i_rValues, const char* i_pWhich);
-
-/// The segment that stands farthest from its bone in the file; nothing if all stand where their bones do.
-std::optional<RetargetSetup::VPoseDifference> DifferenceFromFile(VSession& io_rSession);
-
-/// Logs "i_pWhat differs from the pose in the file", with the worst bone in mm and degrees, and i_pHint behind it.
-void TellDifferenceFromFile(VSession& io_rSession, const RetargetSetup::VPoseDifference& i_rWorst, int i_Level,
-    const char* i_pWhat, const char* i_pHint);
 
 } // namespace CommandLine

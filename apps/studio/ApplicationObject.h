@@ -11,6 +11,10 @@ namespace StudioHost
 
 class VPreferences;
 
+/// Among the numbers of the preferences: target subjects that are made take the pose of their FBX file. Without it they
+/// do.
+inline constexpr const char* c_pPoseFromFileKey = "PoseFromFBX";
+
 /// This program as modules see it: the rules that its preferences set, and the question before work is lost.
 class VApplicationObject : public TesselPluginInterface::IApplicationObject, public TesselPluginInterface::IHostRules
 {

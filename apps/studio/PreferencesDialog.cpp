@@ -3,9 +3,11 @@
 #include "TesselPluginInterface/PathTypes.h"
 #include "UtilsFileSystem/InstalledProducts.h"
 #include "UtilsFileSystem/Paths.h"
+#include "studio/ApplicationObject.h"
 #include "studio/Named.h"
 #include "studio/Preferences.h"
 
+#include <QCheckBox>
 #include <QComboBox>
 #include <QDialogButtonBox>
 #include <QFileDialog>
@@ -66,6 +68,7 @@ VPreferencesDialog::VPreferencesDialog(VPreferences& i_rPreferences, QWidget* i_
 	                      "templates are offered after the next start."),
 	                   products),
 	    tr("Products"));
+	pPages->addTab(CharactersPage(), tr("Characters"));
 	pPages->addTab(NavigationPage(), tr("Navigation"));
 
 	auto* const pButtons =
@@ -157,6 +160,20 @@ void VPreferencesDialog::AddFolderRow(QGridLayout& io_rLayout, const std::string
 	m_Folders.push_back({i_rKey, pEdit});
 }
 
+QWidget* VPreferencesDialog::CharactersPage()
+{
+	auto* const pPage = Named(new QWidget, "CharactersPage", tr("Characters"));
+	auto* const pLayout = new QVBoxLayout(pPage);
+	m_pPoseFromFile = Named(new QCheckBox(tr("\"Create Target Subject\" takes the pose from the FBX file")),
+	    c_pPoseFromFileKey, tr("Take the pose from the FBX file"));
+	m_pPoseFromFile->setToolTip(
+	    tr("Otherwise many characters lie on their back until \"Take pose from FBX\" is pressed"));
+	m_pPoseFromFile->setChecked(m_rPreferences.Number(c_pPoseFromFileKey, 1) != 0);
+	pLayout->addWidget(m_pPoseFromFile);
+	pLayout->addStretch();
+	return pPage;
+}
+
 QWidget* VPreferencesDialog::NavigationPage()
 {
 	auto* const pPage = Named(new QWidget, "NavigationPage", tr("Navigation"));
@@ -179,6 +196,7 @@ void VPreferencesDialog::Apply()
 	for (const VFolderRow& rRow : m_Folders)
 		m_rPreferences.SetFolder(
 		    rRow.m_Key, UtilsFileSystem::PathFromUtf8(rRow.m_pEdit->text().trimmed().toStdString()));
+	m_rPreferences.SetNumber(c_pPoseFromFileKey, m_pPoseFromFile->isChecked() ? 1 : 0);
 	m_rPreferences.SetNumber(TesselPluginInterface::c_NavigationAltKey, m_pNavigationAlt->currentData().toInt());
 }
 

@@ -2,6 +2,7 @@
 
 #include <QDialog>
 
+class QCheckBox;
 class QComboBox;
 class QGridLayout;
 class QLineEdit;
@@ -11,8 +12,8 @@ namespace StudioHost
 
 class VPreferences;
 
-/// The preferences: a row for each kind of folder, one for each product whose folder the system cannot tell, and what
-/// the Alt key does. Taken over by "OK" and "Apply".
+/// The preferences: a row for each kind of folder, one for each product whose folder the system cannot tell, how
+/// characters are made, and what the Alt key does. Taken over by "OK" and "Apply".
 class VPreferencesDialog : public QDialog
 {
 	Q_OBJECT
@@ -34,10 +35,12 @@ private:
 	QWidget* FolderPage(const char* i_pName, const QString& i_rIntroduction,
 	    const std::vector<std::pair<std::string, QString>>& i_rKeys);
 	void AddFolderRow(QGridLayout& io_rLayout, const std::string& i_rKey, const QString& i_rLabel);
+	QWidget* CharactersPage();
 	QWidget* NavigationPage();
 
 	VPreferences& m_rPreferences;
 	std::vector<VFolderRow> m_Folders;
+	QCheckBox* m_pPoseFromFile = nullptr;
 	QComboBox* m_pNavigationAlt = nullptr;
 };
 

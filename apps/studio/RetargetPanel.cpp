@@ -35,7 +35,8 @@ constexpr const char* c_pFbx = "TargetFBX";
 constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubject", "Create Target Subject"},
     {"LoadTargetSubjectURL", "Load"}, {"SaveTargetSubjectURL", "Save"}, {"AddTarget", "Add target"},
     {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"},
-    {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"UpdateTargets", "Update targets"}};
+    {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"MatchFilePose", "Take pose from FBX"},
+    {"UpdateTargets", "Update targets"}};
 
 /// By objectName, of what can be seen.
 const QQuickItem* ItemNamed(const QQuickItem& i_rItem, const QString& i_rName)

@@ -5,10 +5,14 @@
 
 #include "CoreOrlexTypes/SubjectRecord.h"
 #include "CoreOrlexTypes/TextForm.h"
+#include "InMemoryHost/Application.h"
 #include "RetargetSetupDocument/FilePath.h"
+
+#include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
 #include <limits>
+#include <numbers>
 #include <sstream>
 
 namespace
@@ -178,6 +182,46 @@ TEST_F(Flow, ARootWithAPreRotationAndALostRotationAreTold)
 	m_Document.SetTargetRootIndex(1);
 	m_Document.CreateTargetSubject();
 	EXPECT_NE(log.Take().find("3 RetargetSetup: The place of root bone 'mirror' is no rotation"), std::string::npos);
+}
+
+TEST_F(Flow, ThePoseOfTheFileAtOnceOrByItsCommand)
+{
+	const std::string arnaud = RETARGET_TEST_DATA "/fbx/pab_arnaud_b7500.fbx";
+	const QString c_Note =
+	    "The character stands turned by 90 degrees against its FBX file: the pre-rotation of its root "
+	    "bone 'Hips' counts twice.";
+	const auto pApplication = std::make_shared<InMemoryHost::VApplication>();
+	ASSERT_TRUE(m_Document.LoadTargetFBX(arnaud));
+	m_Document.CreateTargetSubject();
+	EXPECT_NEAR(m_Document.DifferenceFromFile().value().m_Angle, std::numbers::pi / 2, 1e-4);
+	EXPECT_EQ(m_Document.PoseNote(), c_Note);
+	m_Document.SaveTargetSubject(m_Folder / "lying.qrr");
+	m_Document.MatchFilePose();
+	EXPECT_FALSE(m_Document.DifferenceFromFile());
+	EXPECT_EQ(m_Document.PoseNote(), "");
+	const VSubjectParametrised byCommand = Target();
+
+	ASSERT_EQ(m_Document.LoadTargetSubject(m_Folder / "lying.qrr"), 0u);
+	EXPECT_EQ(m_Document.PoseNote(), c_Note) << "the file is the chosen one";
+	m_Document.MatchFilePose();
+	EXPECT_FALSE(m_Document.DifferenceFromFile());
+
+	m_Document.SetHostRules(pApplication);
+	m_Document.CreateTargetSubject();
+	EXPECT_NE(m_Document.PoseNote(), "") << "a host that wants it";
+	pApplication->m_Rules.m_bPoseFromFile = true;
+	VLogRecorder log;
+	m_Document.CreateTargetSubject();
+	EXPECT_TRUE(Target() == byCommand);
+	EXPECT_EQ(log.Take(), "") << "nothing to warn of";
+	EXPECT_EQ(m_Document.PoseNote(), "");
+
+	// Another file with the same bones is another character.
+	boost::filesystem::copy_file(arnaud, m_Folder / "other.fbx");
+	ASSERT_TRUE(m_Document.LoadTargetFBX(m_Folder / "other.fbx"));
+	m_Document.MatchFilePose();
+	EXPECT_FALSE(m_Document.DifferenceFromFile());
+	EXPECT_TRUE(Target() == byCommand);
 }
 
 TEST_F(Flow, AnFBXFileThatGivesNoSkeleton)

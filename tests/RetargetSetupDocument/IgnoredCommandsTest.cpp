@@ -56,6 +56,7 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	    {"nothing", [] {}, "RemoveUnnecessaryJoints", [this] { m_Document.RemoveUnnecessaryJoints(); }, c_NoTarget},
 	    {"nothing", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(Url("a.qrr")); },
 	        c_NoTarget},
+	    {"nothing", [] {}, "MatchFilePose", [this] { m_Document.MatchFilePose(); }, c_NoTarget},
 	    {"an FBX, a root beyond it",
 	        [this]
 	        {
@@ -72,7 +73,24 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	    {"a source", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); }, c_NoTarget},
 	    {"both", [this] { SetSmallSubjects(); }, "AddTarget", [this] { m_Document.AddTarget(-1, 0, true, true); },
 	        "No single segment of the source subject is selected."},
-	    {"both", [] {}, "AddTarget", [this] { m_Document.AddTarget(0, 5, false, false); },
+	    {"both", [] {}, "MatchFilePose", [this] { m_Document.MatchFilePose(); },
+	        "The segments of the target subject are not the bones of the FBX file. Choose the FBX file that it was "
+	        "made "
+	        "from."},
+	    {"its FBX, a hinge",
+	        [this]
+	        {
+		        m_Document.SetTargetRootIndex(0);
+		        m_Document.CreateTargetSubject();
+		        VSubjectParametrised subject = Target();
+		        subject.m_Segments[4].m_Joint.m_JointType = VSubjectParametrised::VJoint::EHinge;
+		        m_Document.SetTargetSubjectParametrised(subject);
+	        },
+	        "MatchFilePose", [this] { m_Document.MatchFilePose(); },
+	        "The target subject has joints, post poses or parameters of its own, which the pose of an FBX file does "
+	        "not "
+	        "fit."},
+	    {"both", [this] { SetSmallSubjects(); }, "AddTarget", [this] { m_Document.AddTarget(0, 5, false, false); },
 	        "No single segment of the target subject is selected."},
 	    {"both", [] {}, "RemoveTarget", [this] { m_Document.RemoveTarget(-1); }, "No single target is selected."},
 	    {"both", [] {}, "LoadTargetSubjectURL", [this] { m_Document.LoadTargetSubjectURL(QUrl("http://a/b.qrr")); },

@@ -466,6 +466,8 @@ TEST_F(Window, PreferencesHaveARowForEachFolder)
 		auto* const pAlt = dialog.findChild<QComboBox*>(TesselPluginInterface::c_NavigationAltKey);
 		EXPECT_EQ(pAlt->currentData(), 1);
 		pAlt->setCurrentIndex(1);
+		EXPECT_TRUE(m_pWindow->Context().Application().Rules().m_bPoseFromFile);
+		QTest::mouseClick(dialog.findChild<QAbstractButton*>("PoseFromFBX"), Qt::LeftButton);
 		EXPECT_TRUE(rPreferences.Folder(keys.front()).empty()) << "nothing is taken over before it is asked for";
 		QTest::mouseClick(dialog.findChild<QAbstractButton*>("PreferencesOk"), Qt::LeftButton);
 		EXPECT_EQ(dialog.result(), QDialog::Accepted);
@@ -476,6 +478,7 @@ TEST_F(Window, PreferencesHaveARowForEachFolder)
 
 	// The next run has them, and an empty field takes a folder away.
 	Restart();
+	EXPECT_FALSE(m_pWindow->Context().Application().Rules().m_bPoseFromFile);
 	VPreferencesDialog dialog(m_pWindow->Context().Preferences());
 	auto* const pSkins = dialog.findChild<QLineEdit*>("FolderSkins");
 	EXPECT_EQ(pSkins->text(), "/none/FolderSkins");

@@ -32,7 +32,8 @@ TEST_F(Job, TheWholeJob)
 	rOperator.Fill("TargetScale", "1.25");
 	rOperator.Click("createTargetSubject");
 	EXPECT_EVENTUALLY(rOperator.Property("targetSegments", "count").toInt() > 20);
-	QStringList edits{"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--scale", "1.25"};
+	QStringList edits{"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--scale", "1.25",
+	    "--match-file-pose"};
 
 	SelectPair("Pelvis", "haunch");
 	rOperator.Click("addPositionTarget");

@@ -169,7 +169,8 @@ protected:
 
 	VEye m_Eye;
 	VSkeleton m_Source, m_Target;
-	QStringList m_Edits{"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs")};
+	QStringList m_Edits{
+	    "create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--match-file-pose"};
 	QByteArray m_Created;
 };
 

@@ -40,6 +40,8 @@ VSubject BareSegments(const VSubject& i_rSubject)
 	return subject;
 }
 
+} // namespace
+
 double AngleBetween(const Rotation::VMatrix3& i_rA, const Rotation::VMatrix3& i_rB)
 {
 	const Rotation::VVector3 turn =
@@ -47,8 +49,6 @@ double AngleBetween(const Rotation::VMatrix3& i_rA, const Rotation::VMatrix3& i_
 	const double angle = std::hypot(turn[0], turn[1], turn[2]);
 	return std::min(angle, 2.0 * std::numbers::pi - angle);
 }
-
-} // namespace
 
 std::unique_ptr<VComputeSubjectFK> KinematicsInBindPose(
     const VSubjectParametrised& i_rParametrised, const VSubject& i_rSubject, std::string_view i_Which)

@@ -29,6 +29,9 @@ std::unique_ptr<ComputeSubject::VComputeSubjectFK> KinematicsInBindPose(
 /// World poses of all segments, in order.
 std::vector<Rotation::VPose<double>> SegmentPoses(const ComputeSubject::VComputeSubjectFK& i_rFK);
 
+/// Of the rotation from one to the other, in radians from 0 to pi.
+double AngleBetween(const Rotation::VMatrix3& i_rA, const Rotation::VMatrix3& i_rB);
+
 struct VPoseDifference
 {
 	std::size_t m_SegmentIndex = 0;

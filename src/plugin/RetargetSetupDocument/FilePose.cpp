@@ -1,13 +1,22 @@
 #include "RetargetSetupDocument/FilePose.h"
 
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/Subject.h"
 #include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupDocument/AngleAxis.h"
 #include "RetargetSetupDocument/GlobalScale.h"
+#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/ParseNumber.h"
+#include "RetargetSetupDocument/TargetConstruction.h"
 #include "math/NumberText.h"
+
+#include <boost/format.hpp>
 
 #include <algorithm>
 #include <cmath>
+#include <numbers>
 
 namespace RetargetSetup
 {
@@ -76,7 +85,36 @@ VVector3 AngleAxis(const VMatrix3& i_rRotation)
 	return Rotation::CanonicalAngleAxis(Rotation::AngleAxisFromRotationMatrix(i_rRotation));
 }
 
+bool AreTheSegments(const VSubjectParametrised& i_rSubject, const FBXIO::VSkinSkeleton& i_rBones)
+{
+	return std::ranges::equal(i_rSubject.m_Segments, i_rBones,
+	    [](const VSubjectParametrised::VSegment& i_rSegment, const FBXIO::VSkinBone& i_rBone)
+	    {
+		    return i_rSegment.m_Name == StripNamespace(i_rBone.m_Name)
+		        && i_rSegment.m_ParentSegmentIndex == std::uint32_t(i_rBone.m_ParentIndex);
+	    });
+}
+
 } // namespace
+
+FBXIO::VSkinSkeleton BonesOfSegments(
+    const VSubjectParametrised& i_rSubject, const FBXIO::VSkinSkeleton& i_rSkeleton, std::size_t i_Root)
+{
+	if (i_rSubject.m_Segments.empty())
+		return {};
+	// The one that is asked for, then all.
+	for (std::size_t i = 0; i <= i_rSkeleton.size(); ++i)
+	{
+		const std::size_t root = i == 0 ? i_Root : i - 1;
+		if (root >= i_rSkeleton.size()
+		    || i_rSubject.m_Segments.front().m_Name != StripNamespace(i_rSkeleton[root].m_Name))
+			continue;
+		FBXIO::VSkinSkeleton bones = ExtractSubtree(i_rSkeleton, root);
+		if (AreTheSegments(i_rSubject, bones))
+			return bones;
+	}
+	return {};
+}
 
 std::vector<VPose<double>> PosesInFile(const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_Scale)
 {
@@ -142,6 +180,80 @@ VFileMatch MatchFilePose(
 		rSegment.m_Joint.m_Mean = rBindPose;
 	}
 	return match;
+}
+
+bool HoldsFilePose(const VSubjectParametrised& i_rSubject)
+{
+	using VJoint = VSubjectParametrised::VJoint;
+	constexpr VVector3 c_None{};
+	for (std::size_t i = 0; i < i_rSubject.m_Segments.size(); ++i)
+	{
+		const VSubjectParametrised::VSegment& rSegment = i_rSubject.m_Segments[i];
+		const VJoint::EJointType type = rSegment.m_Joint.m_JointType;
+		if (type != (i == 0 ? VJoint::EFree : VJoint::EBall) && (i == 0 || type != VJoint::EDummy))
+			return false;
+		if (rSegment.m_Joint.m_JointOrientation != c_None || rSegment.m_InversePostRotation != c_None
+		    || rSegment.m_InversePostTranslation != c_None)
+			return false;
+	}
+	return i_rSubject.m_DynamicParameters.size() == 1
+	    && i_rSubject.m_DynamicParameters.front().m_Name == c_GlobalScaleName;
+}
+
+std::optional<VPoseDifference> DifferenceFromFile(
+    const VSubjectParametrised& i_rSubject, const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis)
+{
+	CoreOrlexTypes::VSubject subject;
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(i_rSubject, subject);
+	const auto pFK = KinematicsInBindPose(i_rSubject, subject, "target");
+	return pFK ? WorstPoseDifference(PosesInFile(i_rBones, i_rAxis, GetGlobalScale(i_rSubject)), SegmentPoses(*pFK))
+	           : std::nullopt;
+}
+
+std::string WorstText(const VSubjectParametrised& i_rSubject, const VPoseDifference& i_rWorst)
+{
+	return (boost::format("at worst \"%1%\" by %2$.1f mm and %3$.1f degrees")
+	    % i_rSubject.m_Segments[i_rWorst.m_SegmentIndex].m_Name % i_rWorst.m_Distance
+	    % (i_rWorst.m_Angle * 180.0 / std::numbers::pi))
+	    .str();
+}
+
+void MatchFilePoseAndTell(
+    VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis)
+{
+	const VFileMatch match = MatchFilePose(io_rSubject, i_rBones, i_rAxis);
+	if (!match.m_Lengths.empty())
+		NVX_LOG(c_LogCategory, NVX::ELogInformation, "Pose from the FBX file: %1% segments got the file's lengths",
+		    match.m_Lengths.size());
+	if (!match.m_PreRotations.empty())
+		NVX_LOG(c_LogCategory, NVX::ELogInformation, "Pose from the FBX file: %1% segments without a joint were turned",
+		    match.m_PreRotations.size());
+	// What lengths within a thousandth of the file's add up to is no concern.
+	if (const auto worst = DifferenceFromFile(io_rSubject, i_rBones, i_rAxis))
+		NVX_LOG(c_LogCategory,
+		    worst->m_Distance > 1.0 || worst->m_Angle > 1e-3 ? NVX::ELogWarning : NVX::ELogInformation,
+		    "The bind pose still differs from the pose in the FBX file, %1%", WorstText(io_rSubject, *worst));
+}
+
+std::optional<VTurnedRoot> FindTurnedRoot(
+    const VSubjectParametrised& i_rSubject, const FBXIO::VSkinSkeleton& i_rSkeleton, const QMatrix4x4& i_rAxis)
+{
+	if (i_rSubject.m_Segments.empty())
+		return std::nullopt;
+	const VSubjectParametrised::VSegment& rRoot = i_rSubject.m_Segments.front();
+	VVector3 preRotation{};
+	for (std::size_t i = 0; i < 3; ++i)
+		ParseNumber(rRoot.m_PreRotation[i], preRotation[i]);
+	const double angle = Length(Rotation::CanonicalAngleAxis(preRotation));
+	const std::vector<double>& rBindPose = rRoot.m_Joint.m_BindPose;
+	if (angle < c_SamePoseAngle || rBindPose.size() < preRotation.size())
+		return std::nullopt;
+	const VVector3 rotation{rBindPose[0], rBindPose[1], rBindPose[2]};
+	for (const FBXIO::VSkinBone& rBone : i_rSkeleton)
+		if (rRoot.m_Name == StripNamespace(rBone.m_Name)
+		    && Length(Minus(rotation, MatrixToAngleAxis(i_rAxis * rBone.m_Global))) < c_SamePoseAngle)
+			return VTurnedRoot{rBone.m_Name, angle};
+	return std::nullopt;
 }
 
 } // namespace RetargetSetup

@@ -13,6 +13,10 @@ inline constexpr const char* c_NoTargetSegment = "No single segment of the targe
 inline constexpr const char* c_NoSelectedTarget = "No single target is selected.";
 inline constexpr const char* c_SourceNoTree = "The segments of the source subject make no tree with joints.";
 inline constexpr const char* c_TargetNoTree = "The segments of the target subject make no tree with joints.";
+inline constexpr const char* c_NotItsFBX =
+    "The segments of the target subject are not the bones of the FBX file. Choose the FBX file that it was made from.";
+inline constexpr const char* c_OwnJoints =
+    "The target subject has joints, post poses or parameters of its own, which the pose of an FBX file does not fit.";
 inline constexpr const char* c_HostRefused = "The host took no item for the change, so everything stays as it was.";
 inline constexpr const char* c_TargetKept = "The target subject has changes that are not saved, and stays.";
 /// The target's name is %1.

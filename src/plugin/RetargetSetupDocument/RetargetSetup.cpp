@@ -163,6 +163,7 @@ bool VRetargetSetup::SetTargetSubject(VSubjectParametrised i_Parametrised, VSubj
 	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)), NewIdentities()))
 		return false;
 	m_TargetExtras = std::move(i_Extras);
+	m_TargetAtRest = TargetValues();
 	return true;
 }
 
@@ -281,5 +282,6 @@ void VRetargetSetup::Publish()
 	const auto pTarget = TargetValues().m_pParametrised;
 	m_pTargetSegmentModel->SetSubject(pTarget ? pTarget : s_pNone);
 	m_pTargetModel->SetSubject(pTarget ? pTarget : s_pNone);
+	UpdatePoseNote();
 	m_ChangedSignal.Fire();
 }

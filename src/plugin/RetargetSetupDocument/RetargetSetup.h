@@ -6,6 +6,7 @@
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "FBXIO/SkinSkeleton.h"
 #include "NVX/Signal.h"
+#include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/RetargetSetupSegmentModel.h"
 #include "RetargetSetupDocument/RetargetSetupTargetModel.h"
 #include "TesselPluginInterface/IDispatcher.h"
@@ -20,6 +21,7 @@
 #include <boost/filesystem/path.hpp>
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -43,6 +45,9 @@ class VRetargetSetup : public QObject
 	Q_PROPERTY(bool jointSymmetry READ JointSymmetry WRITE SetJointSymmetry NOTIFY jointSymmetryChanged)
 	/// Read by whoever marks the file's name.
 	Q_PROPERTY(bool unsavedChanges READ HasUnsavedChanges NOTIFY unsavedChangesChanged)
+	/// Why the target subject lies or stands askew as it was made, a sentence for the operator; empty if it does not, or
+	/// if its FBX file is not the one that was read last.
+	Q_PROPERTY(QString poseNote READ PoseNote NOTIFY poseNoteChanged)
 
 public:
 	/// A subject in its three forms. Null what there is not; shared, and never changed.
@@ -60,6 +65,8 @@ public:
 
 	/// What the host gives beyond its services; null asks nothing and has the plain form of every rule.
 	void SetHostRules(std::shared_ptr<TesselPluginInterface::IHostRules> i_pRules);
+	/// As the host has them now.
+	TesselPluginInterface::VHostRules HostRules() const;
 
 	/// Makes the target subject anew from the FBX skeleton, from the root bone on and with the target scale. Targets,
 	/// joint edits and bind poses of the one before are lost. It is of no file.
@@ -81,6 +88,10 @@ public:
 	/// Takes the joints, but for the root's, from segments that carry no target; a Ball joint's pose goes into its
 	/// segment.
 	Q_INVOKABLE void RemoveUnnecessaryJoints();
+
+	/// Gives all segments the pose that their bones have in the FBX file, which must be the one that was read last. A
+	/// subject that is made stands so at once where the host's rules want it.
+	Q_INVOKABLE void MatchFilePose();
 
 	/// Recalculates the offset of each target from the present bind poses.
 	Q_INVOKABLE void UpdateTargets();
@@ -104,6 +115,12 @@ public:
 
 	/// False if the latest FBX file broke off and the skeleton is what was read until then.
 	bool IsTargetFBXComplete() const { return m_bTargetFBXComplete; }
+
+	/// The segment of the target subject that stands farthest from its bone in the FBX file that was read last; nothing
+	/// if all stand where their bones do, or if they are not the bones of that file.
+	std::optional<RetargetSetup::VPoseDifference> DifferenceFromFile() const;
+
+	const QString& PoseNote() const { return m_PoseNote; }
 
 	/// Index into the FBX skeleton; takes effect with the next CreateTargetSubject.
 	/// @param i_bChosen false for a default, with which it is told that the file has other root bones.
@@ -157,6 +174,9 @@ public:
 	/// Another one after each subject that was made, loaded or set as a whole; 0 without a target subject.
 	std::uint64_t TargetSubjectIdentity() const { return m_Identities.m_Subject; }
 
+	/// The target subject as it was made, loaded or given the pose of its FBX file, whichever was last.
+	const VSubjectValues& TargetAtRest() const { return m_TargetAtRest; }
+
 	/// Copies; false, with nothing copied, if there is none.
 	bool GetSourceTemplate(CoreOrlexTypes::VSubject& o_rSubject) const;
 	bool GetSourceSubject(CoreOrlexTypes::VSubjectParametrised& o_rSubject) const;
@@ -192,6 +212,7 @@ public:
 
 signals:
 	void jointSymmetryChanged();
+	void poseNoteChanged();
 
 	/// With each change of the target subject and each save.
 	void unsavedChangesChanged();
@@ -231,9 +252,6 @@ private:
 		std::vector<std::uint64_t> m_Targets;
 	};
 
-	/// As the host has them now.
-	TesselPluginInterface::VHostRules HostRules() const;
-
 	/// Asks the host before changes that are not saved are lost. False, and the command is ignored, if they stay.
 	/// @param i_pAction the command in the operator's words.
 	bool MayReplaceTarget(const char* i_pCommand, const char* i_pAction);
@@ -262,6 +280,11 @@ private:
 	/// The source subject at rest in its bind pose; null if it has none. Kept until the source subject is another one.
 	const ComputeSubject::VComputeSubjectFK* SourceKinematics();
 
+	/// Of the FBX file that was read last, the bones that the target subject's segments were made of; empty if it was
+	/// made of another file.
+	FBXIO::VSkinSkeleton BonesOfTarget() const;
+	void UpdatePoseNote();
+
 	static VSubjectValues ValuesOf(const VSubjectItems& i_rItems);
 
 	/// Replaces the items of one subject and publishes.
@@ -287,6 +310,7 @@ private:
 	std::string m_TargetFBXError;
 	std::string m_SourceName;
 	std::string m_ShownSourceName;
+	QString m_PoseNote;
 	VSubjectItems m_SourceItems;
 	VSubjectItems m_TargetItems;
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame;
@@ -306,6 +330,8 @@ private:
 	QByteArray m_TargetFileDigest;
 	/// As CreateTargetSubject left it.
 	VSubjectValues m_MadeTarget;
+
+	VSubjectValues m_TargetAtRest;
 
 	std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pSourceFK;
 	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubjectOfSourceFK;

@@ -9,6 +9,7 @@
 #include "RetargetSetupDocument/AngleAxis.h"
 #include "RetargetSetupDocument/DefaultPose.h"
 #include "RetargetSetupDocument/FilePath.h"
+#include "RetargetSetupDocument/FilePose.h"
 #include "RetargetSetupDocument/GlobalScale.h"
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/IgnoredCommands.h"
@@ -181,20 +182,24 @@ void VRetargetSetup::CreateTargetSubject()
 		return Ignore(c_Command, Ignored::c_NoRootBone);
 	}
 	const FBXIO::VSkinBone& rRootBone = (*pSkeleton)[m_TargetRootIndex];
-	const QMatrix4x4 world = m_TargetAxisMatrix * rRootBone.m_Global;
+	const QMatrix4x4 axis = m_TargetAxisMatrix;
+	const QMatrix4x4 world = axis * rRootBone.m_Global;
+	const FBXIO::VSkinSkeleton bones = RetargetSetup::ExtractSubtree(*pSkeleton, m_TargetRootIndex);
 	const bool bRootChosen = m_bTargetRootChosen;
+	const bool bPoseFromFile = HostRules().m_bPoseFromFile;
 	if (!MayReplaceTarget(c_Command, "Create Target Subject"))
 		return;
 	if (!bRootChosen)
 		TellOtherRoots(*pSkeleton);
-	TellTwiceTurnedRoot(rRootBone);
+	if (!bPoseFromFile)
+		TellTwiceTurnedRoot(rRootBone);
 	if (const auto pBefore = TargetValues().m_pApplicationData;
 	    pBefore && pBefore->m_Skin != m_TargetName && m_TargetScale != 1.0)
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "'%1%' is made with the scale %2%, which was that of '%3%'",
 		    m_TargetName, m_TargetScale, pBefore->m_Skin);
 
 	const std::optional<Rotation::VVector3> rotation = RetargetSetup::RotationOf(world);
-	if (!rotation)
+	if (!rotation && !bPoseFromFile)
 		NVX_LOG(c_LogCategory, NVX::ELogWarning,
 		    "The place of root bone '%1%' is no rotation (negative or sheared scale): it is lost and counts as none",
 		    rRootBone.m_Name);
@@ -205,6 +210,8 @@ void VRetargetSetup::CreateTargetSubject()
 	for (int row = 0; row < 3; ++row)
 		rJoint.m_BindPose[std::size_t(3 + row)] = double(world(row, 3));
 	rJoint.m_Mean = rJoint.m_BindPose;
+	if (bPoseFromFile)
+		RetargetSetup::MatchFilePoseAndTell(subject, bones, axis);
 	if (!SetTargetSubject(std::move(subject), std::move(applicationData)))
 		return Ignore(c_Command, Ignored::c_HostRefused);
 	m_MadeTarget = TargetValues();
@@ -276,6 +283,7 @@ std::uint32_t VRetargetSetup::LoadTargetSubject(const boost::filesystem::path& i
 	m_TargetExtras = std::move(extras);
 	m_SourceName = std::move(sourceName);
 	m_SavedTarget = TargetValues();
+	m_TargetAtRest = m_SavedTarget;
 	emit unsavedChangesChanged();
 	RememberTargetFile(i_rPath);
 	return NVX::Status::c_Success;

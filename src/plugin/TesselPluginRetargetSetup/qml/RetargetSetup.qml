@@ -428,12 +428,23 @@ Rectangle {
 						}
 					}
 
-					OrlexButton {
-						objectName: "updateTargets"
-						Layout.fillWidth: true
-						text: "Update targets"
-						toolTip: "Recalculate offsets to each target based on the current pose"
-						onClicked: retargetSetup.run(() => ContextRetargetSetup.UpdateTargets())
+					RowLayout {
+						spacing: Theme.spacing
+
+						OrlexButton {
+							objectName: "matchFilePose"
+							Layout.fillWidth: true
+							text: "Take pose from FBX"
+							toolTip: "Pose the retarget skeleton as the bones stand in the selected FBX"
+							onClicked: retargetSetup.run(() => ContextRetargetSetup.MatchFilePose())
+						}
+						OrlexButton {
+							objectName: "updateTargets"
+							Layout.fillWidth: true
+							text: "Update targets"
+							toolTip: "Recalculate offsets to each target based on the current pose"
+							onClicked: retargetSetup.run(() => ContextRetargetSetup.UpdateTargets())
+						}
 					}
 
 					RetargetSetupTargetTable {
@@ -571,6 +582,47 @@ Rectangle {
 								if (modelData.other !== "")
 									sceneFBO.sceneOptions[modelData.other] = checked
 							}
+						}
+					}
+				}
+
+				// Why a character lies, with what sets it upright; the axes stand beside it.
+				Rectangle {
+					objectName: "poseNote"
+					anchors {
+						left: parent.left
+						right: parent.right
+						bottom: parent.bottom
+						leftMargin: 108
+						rightMargin: Theme.margin
+						bottomMargin: Theme.margin
+					}
+					height: poseNote.implicitHeight + 2 * Theme.spacing
+					visible: ContextRetargetSetup.poseNote !== ""
+					radius: Theme.radius
+					color: Theme.window
+					border.color: Theme.warning
+
+					RowLayout {
+						id: poseNote
+						anchors {
+							left: parent.left
+							right: parent.right
+							verticalCenter: parent.verticalCenter
+							margins: Theme.spacing
+						}
+						spacing: Theme.spacing
+
+						OrlexLabel {
+							Layout.fillWidth: true
+							text: ContextRetargetSetup.poseNote
+							wrapMode: Text.Wrap
+							elide: Text.ElideNone
+						}
+						OrlexButton {
+							objectName: "poseNoteMatch"
+							text: "Take pose from FBX"
+							onClicked: retargetSetup.run(() => ContextRetargetSetup.MatchFilePose())
 						}
 					}
 				}

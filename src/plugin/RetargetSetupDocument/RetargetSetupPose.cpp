@@ -1,0 +1,68 @@
+// The operations of VRetargetSetup that hold the target subject against the pose in its FBX file.
+
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupDocument/FilePose.h"
+#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/IgnoredCommands.h"
+#include "RetargetSetupDocument/RetargetSetup.h"
+
+#include <cmath>
+#include <numbers>
+
+using CoreOrlexTypes::VSubjectParametrised;
+using RetargetSetup::c_LogCategory;
+namespace Ignored = RetargetSetup::Ignored;
+
+FBXIO::VSkinSkeleton VRetargetSetup::BonesOfTarget() const
+{
+	const VSubjectValues target = TargetValues();
+	if (!m_pFBXSkeleton || !target.m_pParametrised || !target.m_pApplicationData
+	    || target.m_pApplicationData->m_Skin != m_TargetName)
+		return {};
+	return RetargetSetup::BonesOfSegments(*target.m_pParametrised, *m_pFBXSkeleton, m_TargetRootIndex);
+}
+
+std::optional<RetargetSetup::VPoseDifference> VRetargetSetup::DifferenceFromFile() const
+{
+	const FBXIO::VSkinSkeleton bones = BonesOfTarget();
+	if (bones.empty())
+		return std::nullopt;
+	return RetargetSetup::DifferenceFromFile(*TargetValues().m_pParametrised, bones, m_TargetAxisMatrix);
+}
+
+void VRetargetSetup::MatchFilePose()
+{
+	constexpr const char* c_Command = "MatchFilePose";
+	const VSubjectValues target = TargetValues();
+	if (!target.m_pParametrised || !target.m_pApplicationData)
+		return Ignore(c_Command, Ignored::c_NoTarget);
+	if (!m_pFBXSkeleton)
+		return Ignore(c_Command, Ignored::c_NoFBX);
+	const FBXIO::VSkinSkeleton bones = BonesOfTarget();
+	if (bones.empty())
+		return Ignore(c_Command, Ignored::c_NotItsFBX);
+	if (!RetargetSetup::HoldsFilePose(*target.m_pParametrised))
+		return Ignore(c_Command, Ignored::c_OwnJoints);
+	VSubjectParametrised subject = *target.m_pParametrised;
+	RetargetSetup::MatchFilePoseAndTell(subject, bones, m_TargetAxisMatrix);
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData))
+		m_TargetAtRest = TargetValues();
+}
+
+void VRetargetSetup::UpdatePoseNote()
+{
+	const VSubjectValues target = TargetValues();
+	QString note;
+	if (m_pFBXSkeleton && target.m_pParametrised && target.m_pApplicationData
+	    && target.m_pApplicationData->m_Skin == m_TargetName)
+		if (const auto turned
+		    = RetargetSetup::FindTurnedRoot(*target.m_pParametrised, *m_pFBXSkeleton, m_TargetAxisMatrix))
+			note = QStringLiteral("The character stands turned by %1 degrees against its FBX file: the pre-rotation of "
+			                      "its root bone '%2' counts twice.")
+			           .arg(std::lround(turned->m_Angle * 180.0 / std::numbers::pi))
+			           .arg(QString::fromStdString(turned->m_BoneName));
+	if (note == m_PoseNote)
+		return;
+	m_PoseNote = note;
+	emit poseNoteChanged();
+}
