@@ -1,5 +1,17 @@
 #include "TesselPluginRetargetSetup/ManipulatorMove.h"
 
+#include "../LogRecorder.h"
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "InMemoryHost/Application.h"
+#include "InMemoryHost/PluginContext.h"
+#include "RetargetSetupDocument/BindPose.h"
+#include "RetargetSetupDocument/Mirror.h"
+#include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/RetargetTargets.h"
+
+#include <Eigen/Geometry>
+#include <boost/filesystem/operations.hpp>
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -116,8 +128,106 @@ TEST(ManipulatorMove, JointsInOnePlaceTurnTheRotationRound)
 {
 	VSubjectParametrised::VSegment mirror;
 	mirror.m_Joint.m_BindPose = {0.0, 0.0};
-	RetargetSetup::PoseMirrorSegment(mirror, {}, Place(0, 0, 0, 90, {0, 1, 0}), Place(0, 0.0009f, 0), {});
+	RetargetSetup::PoseMirrorSegment(mirror, {}, Place(0, 0, 0, 90, {0, 1, 0}), Place(0, 0.0009f, 0), {}, {});
 	ExpectNear(mirror.m_Joint.m_BindPose, {0, -c_Quarter});
+}
+
+using Poses = std::vector<Rotation::VPose<double>>;
+
+Poses PosesOf(const VSubjectParametrised& i_rSubject)
+{
+	VSubject subject;
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(i_rSubject, subject);
+	return RetargetSetup::SegmentPoses(*RetargetSetup::KinematicsInBindPose(i_rSubject, subject, "target"));
+}
+
+Eigen::Isometry3d Isometry(const Rotation::VPose<double>& i_rPose)
+{
+	Eigen::Isometry3d isometry = Eigen::Isometry3d::Identity();
+	isometry.linear() = Eigen::Matrix<double, 3, 3, Eigen::RowMajor>(i_rPose.R.data());
+	isometry.translation() = Eigen::Map<const Eigen::Vector3d>(i_rPose.t.data());
+	return isometry;
+}
+
+QMatrix4x4 ToQt(const Eigen::Isometry3d& i_rPose)
+{
+	const Eigen::Matrix4f columns = i_rPose.matrix().cast<float>();
+	return QMatrix4x4(columns.data()).transposed();
+}
+
+/// A segment is turned by one degree. How far the other side is away from the mirror image of that turn, in degrees;
+/// nothing if the two joints coincide.
+double MissedMirror(
+    const VRetargetSetup::VSubjectValues& i_rAtRest, std::size_t i_Segment, std::size_t i_Mirror, bool i_bByRule)
+{
+	const Poses atRest = PosesOf(*i_rAtRest.m_pParametrised);
+	const Eigen::Isometry3d from = Isometry(atRest[i_Segment]);
+	const Eigen::Isometry3d mirrorFrom = Isometry(atRest[i_Mirror]);
+	const Eigen::Vector3d between = from.translation() - mirrorFrom.translation();
+	if (between.norm() < 1.0)
+		return 0.0;
+	const Eigen::AngleAxisd turn(M_PI / 180.0, Eigen::Vector3d(1, 2, -3).normalized());
+	Eigen::Isometry3d dragged = from;
+	dragged.linear() = turn * from.linear();
+	VSubjectParametrised subject = *i_rAtRest.m_pParametrised;
+	RetargetSetup::MoveSegment(
+	    subject, i_Segment, ToQt(dragged), ToQt(from), true,
+	    [&](std::size_t i_Index)
+	    {
+		    const VSubject::VSegment& rSegment = i_rAtRest.m_pSubject->m_Segments[i_Index];
+		    const std::uint32_t parent = rSegment.m_ParentSegmentIndex;
+		    return RetargetSetup::JointFrame(
+		        parent == CoreOrlexTypes::c_NoParent ? QMatrix4x4() : ToQt(Isometry(atRest[parent])), rSegment);
+	    },
+	    [&](std::size_t i_Other)
+	    {
+		    return i_bByRule
+		        && !RetargetSetup::AreMirrorImages(
+		            *i_rAtRest.m_pParametrised, *i_rAtRest.m_pSubject, i_Segment, i_Other);
+	    });
+	const Eigen::Vector3d normal = between.normalized();
+	const Eigen::Matrix3d mirror = Eigen::Matrix3d::Identity() - 2.0 * normal * normal.transpose();
+	const Eigen::Matrix3d expected = mirror * turn * mirror * mirrorFrom.linear();
+	const Eigen::Matrix3d actual = Isometry(PosesOf(subject)[i_Mirror]).linear();
+	return Eigen::AngleAxisd(actual * expected.transpose()).angle() * 180.0 / M_PI;
+}
+
+TEST(ManipulatorMove, OnEveryRigTheOtherSideFollowsASmallDrag)
+{
+	const VLogRecorder quiet;
+	std::vector<std::string> files{RETARGET_SOURCE "/demo/character.fbx"};
+	for (const auto& rEntry : boost::filesystem::directory_iterator(RETARGET_TEST_DATA "/fbx"))
+		if (rEntry.path().extension() == ".fbx")
+			files.push_back(rEntry.path().string());
+	int jumpingRigs = 0;
+	for (const std::string& rFile : files)
+		for (const bool bPoseFromFile : {false, true})
+		{
+			SCOPED_TRACE(rFile);
+			InMemoryHost::VPluginContext host;
+			const auto pApplication = std::make_shared<InMemoryHost::VApplication>();
+			pApplication->m_Rules.m_bPoseFromFile = bPoseFromFile;
+			VRetargetSetup document(host.GetDispatcher(), host.GetFrameFactory(), host.GetItemFactory());
+			document.SetHostRules(pApplication);
+			if (!document.LoadTargetFBX(rFile))
+				continue;
+			document.CreateTargetSubject();
+			double worst = 0.0, worstByPose = 0.0;
+			const std::size_t size = document.TargetAtRest().m_pParametrised->m_Segments.size();
+			for (std::size_t i = 0; i < size; ++i)
+			{
+				const std::int32_t mirror =
+				    RetargetSetup::FindMirrorSegment(*document.TargetAtRest().m_pParametrised, i);
+				if (mirror == -1)
+					continue;
+				worst = std::max(worst, MissedMirror(document.TargetAtRest(), i, std::size_t(mirror), true));
+				worstByPose =
+				    std::max(worstByPose, MissedMirror(document.TargetAtRest(), i, std::size_t(mirror), false));
+			}
+			EXPECT_LT(worst, 0.06);
+			jumpingRigs += worstByPose > 1.0;
+		}
+	EXPECT_GE(jumpingRigs, 10) << "mirroring the pose itself turns the other side of some";
 }
 
 } // namespace

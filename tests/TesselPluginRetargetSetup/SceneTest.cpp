@@ -1,4 +1,5 @@
 #include "../CoreGraphics/OffscreenContext.h"
+#include "InMemoryHost/Application.h"
 #include "NVX/ISelectionItem.h"
 #include "OrlexGraphics/FrameRenderer.h"
 #include "OrlexGraphics/RenderManipulator.h"
@@ -134,6 +135,41 @@ TEST_F(Scene, SegmentsStandWhereTheManipulatorIsDragged)
 	Run();
 	Frame();
 	EXPECT_LT((World(arm).column(3) - before.column(3)).length(), 1e-2f) << "a limb does not leave its parent";
+}
+
+TEST_F(Scene, MirrorsTheChangeWhereTheHostWantsIt)
+{
+	m_pDocument->LoadTargetFBX(RETARGET_TEST_DATA "/fbx/own_ns_yup_cm_b7400.fbx");
+	m_pDocument->CreateTargetSubject();
+	Run();
+	Frame();
+	const std::uint32_t arm = IndexOf("LeftForeArm"), other = IndexOf("RightForeArm");
+	const auto drag = [&]
+	{
+		SelectSegment(arm);
+		const QMatrix4x4 before = World(other);
+		QMatrix4x4 turned = World(arm);
+		turned.rotate(1, 0, 1, 0);
+		Manipulator().ChangedSignal().Fire(turned);
+		Run();
+		Frame();
+		return Distance(before, World(other));
+	};
+	EXPECT_GT(drag(), 0.3f) << "the pose itself is mirrored";
+	const auto pApplication = std::make_shared<InMemoryHost::VApplication>();
+	pApplication->m_Rules.m_bMirrorChange = true;
+	m_pDocument->SetHostRules(pApplication);
+	m_pDocument->CreateTargetSubject();
+	Run();
+	Frame();
+	TakeLog();
+	NVX::GlobalLog::Category("RetargetSetup").SetLevel(NVX::ELogInformation);
+	for (int i = 0; i < 2; ++i)
+	{
+		EXPECT_LT(drag(), 0.02f);
+		EXPECT_EQ(TakeLog().find("mirrors what changes in a pose") != std::string::npos, i == 0) << "told once";
+	}
+	NVX::GlobalLog::Category("RetargetSetup").SetLevel(NVX::ELogWarning);
 }
 
 TEST_F(Scene, ConnectsTheManipulatorOnce)

@@ -2,9 +2,8 @@
 
 #include "CoreOrlexTypes/JointType.h"
 #include "RetargetSetupDocument/AngleAxis.h"
+#include "RetargetSetupDocument/Mirror.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
-
-#include <QVector3D>
 
 #include <algorithm>
 
@@ -19,13 +18,6 @@ namespace
 
 constexpr std::size_t c_RotationLength = 3;
 constexpr std::size_t c_RootLength = 6;
-/// Joints nearer than this, in mm, coincide.
-constexpr float c_SamePlace = 1e-3f;
-
-QVector3D Origin(const QMatrix4x4& i_rMatrix)
-{
-	return i_rMatrix.column(3).toVector3D();
-}
 
 /// The joint's bind pose, with a value for each of its degrees of freedom.
 std::vector<double>& WholePose(VSubjectParametrised::VJoint& io_rJoint)
@@ -33,6 +25,19 @@ std::vector<double>& WholePose(VSubjectParametrised::VJoint& io_rJoint)
 	io_rJoint.m_BindPose.resize(
 	    std::max(io_rJoint.m_BindPose.size(), CoreOrlexTypes::StateSize(io_rJoint.m_JointType)));
 	return io_rJoint.m_BindPose;
+}
+
+/// The rotation of a joint in its frame, as far as its bind pose tells it.
+QMatrix4x4 JointRotation(const VSubjectParametrised::VJoint& i_rJoint)
+{
+	Rotation::VVector3 rotation{};
+	std::copy_n(i_rJoint.m_BindPose.begin(), std::min(c_RotationLength, i_rJoint.m_BindPose.size()), rotation.begin());
+	return AngleAxisToMatrix(rotation);
+}
+
+Rotation::VVector3 Origin(const QMatrix4x4& i_rMatrix)
+{
+	return {i_rMatrix(0, 3), i_rMatrix(1, 3), i_rMatrix(2, 3)};
 }
 
 void SetRotation(std::vector<double>& io_rPose, const QMatrix4x4& i_rRotation)
@@ -63,32 +68,38 @@ void PoseSegment(VSubjectParametrised::VSegment& io_rSegment, const QMatrix4x4& 
 	io_rSegment.m_Joint.m_Mean = rPose;
 }
 
-void PoseMirrorSegment(VSubjectParametrised::VSegment& io_rMirrorSegment, const QMatrix4x4& i_rJointFrame,
-    const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, const QMatrix4x4& i_rMirrorJointFrame)
+void PoseMirrorSegment(VSubjectParametrised::VSegment& io_rMirrorSegment, const QMatrix4x4& i_rFrom,
+    const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, const QMatrix4x4& i_rMirrorJointFrame,
+    const QMatrix4x4& i_rMirrorFrom)
 {
-	const Rotation::VVector3 turn = MatrixToAngleAxis(i_rWorld * i_rJointFrame.inverted());
-	const QVector3D w{float(turn[0]), float(turn[1]), float(turn[2])};
-	const QVector3D between = Origin(i_rOrigin) - Origin(i_rMirrorJointFrame);
-	const QVector3D normal = between.length() < c_SamePlace ? QVector3D() : between.normalized();
-	// A mirror makes of a rotation about an axis one the other way about the mirrored axis.
-	const QVector3D mirrored = -(w - 2.0f * QVector3D::dotProduct(w, normal) * normal);
-	const QMatrix4x4 rotation = AngleAxisToMatrix({double(mirrored.x()), double(mirrored.y()), double(mirrored.z())});
+	const Rotation::VVector3 turn = MatrixToAngleAxis(i_rWorld * i_rFrom.inverted());
+	const QMatrix4x4 mirrored =
+	    AngleAxisToMatrix(Mirrored(turn, MirrorNormal(Origin(i_rOrigin), Origin(i_rMirrorJointFrame))));
 	std::vector<double>& rPose = WholePose(io_rMirrorSegment.m_Joint);
-	SetRotation(rPose, i_rMirrorJointFrame.inverted() * rotation * i_rMirrorJointFrame);
+	SetRotation(rPose, i_rMirrorJointFrame.inverted() * mirrored * i_rMirrorFrom);
 	io_rMirrorSegment.m_Joint.m_Mean = rPose;
 }
 
 bool MoveSegment(VSubjectParametrised& io_rSubject, std::size_t i_SegmentIndex, const QMatrix4x4& i_rWorld,
-    const QMatrix4x4& i_rOrigin, bool i_bSymmetry, const std::function<QMatrix4x4(std::size_t)>& i_rJointFrame)
+    const QMatrix4x4& i_rOrigin, bool i_bSymmetry, const std::function<QMatrix4x4(std::size_t)>& i_rJointFrame,
+    const std::function<bool(std::size_t)>& i_rMirrorsChange)
 {
 	if (i_SegmentIndex >= io_rSubject.m_Segments.size())
 		return false;
+	VSubjectParametrised::VSegment& rSegment = io_rSubject.m_Segments[i_SegmentIndex];
 	const QMatrix4x4 frame = i_rJointFrame(i_SegmentIndex);
-	PoseSegment(io_rSubject.m_Segments[i_SegmentIndex], frame, i_rWorld, i_SegmentIndex == 0);
+	const QMatrix4x4 before = frame * JointRotation(rSegment.m_Joint);
+	PoseSegment(rSegment, frame, i_rWorld, i_SegmentIndex == 0);
 	const std::int32_t mirror = i_bSymmetry ? FindMirrorSegment(io_rSubject, i_SegmentIndex) : -1;
-	if (mirror != -1)
-		PoseMirrorSegment(io_rSubject.m_Segments[std::size_t(mirror)], frame, i_rWorld, i_rOrigin,
-		    i_rJointFrame(std::size_t(mirror)));
+	if (mirror == -1)
+		return true;
+	VSubjectParametrised::VSegment& rMirror = io_rSubject.m_Segments[std::size_t(mirror)];
+	const QMatrix4x4 mirrorFrame = i_rJointFrame(std::size_t(mirror));
+	if (i_rMirrorsChange && i_rMirrorsChange(std::size_t(mirror)))
+		PoseMirrorSegment(
+		    rMirror, before, i_rWorld, i_rOrigin, mirrorFrame, mirrorFrame * JointRotation(rMirror.m_Joint));
+	else
+		PoseMirrorSegment(rMirror, frame, i_rWorld, i_rOrigin, mirrorFrame, mirrorFrame);
 	return true;
 }
 

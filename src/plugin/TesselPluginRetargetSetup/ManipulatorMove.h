@@ -23,19 +23,25 @@ QMatrix4x4 JointFrame(const QMatrix4x4& i_rParentWorld, const CoreOrlexTypes::VS
 void PoseSegment(CoreOrlexTypes::VSubjectParametrised::VSegment& io_rSegment, const QMatrix4x4& i_rJointFrame,
     const QMatrix4x4& i_rWorld, bool i_bRoot);
 
-/// Gives the segment on the other side the mirrored rotation, whatever pose it had before. The mirror plane stands
-/// across the line between the two joints; where they coincide there is none, and the rotation is turned round.
-/// @param i_rWorld the new world matrix of the segment that is dragged.
+/// Gives the segment on the other side the mirror image of a turn. The mirror plane stands across the line between the
+/// two joints; where they coincide there is none, and the rotation is turned round.
+/// @param i_rFrom what the dragged segment turned from to i_rWorld: its joint frame, so that the whole pose is mirrored,
+/// or its world matrix before the drag, so that the change is.
 /// @param i_rOrigin where the manipulator stood when the segment was selected.
-void PoseMirrorSegment(CoreOrlexTypes::VSubjectParametrised::VSegment& io_rMirrorSegment,
-    const QMatrix4x4& i_rJointFrame, const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin,
-    const QMatrix4x4& i_rMirrorJointFrame);
+/// @param i_rMirrorFrom what the segment on the other side turns from: its joint frame, so that its pose is replaced, or
+/// its world matrix before the drag.
+void PoseMirrorSegment(CoreOrlexTypes::VSubjectParametrised::VSegment& io_rMirrorSegment, const QMatrix4x4& i_rFrom,
+    const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, const QMatrix4x4& i_rMirrorJointFrame,
+    const QMatrix4x4& i_rMirrorFrom);
 
 /// The whole of a drag: poses the segment and, with symmetry, the one on the other side if there is one.
 /// @param i_rJointFrame the joint frame of a segment by its index.
+/// @param i_rMirrorsChange tells of the segment on the other side whether it takes over the change of the pose; without
+/// it the pose itself is mirrored.
 /// @return false, with no change, for a segment that is not there.
 bool MoveSegment(CoreOrlexTypes::VSubjectParametrised& io_rSubject, std::size_t i_SegmentIndex,
     const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, bool i_bSymmetry,
-    const std::function<QMatrix4x4(std::size_t)>& i_rJointFrame);
+    const std::function<QMatrix4x4(std::size_t)>& i_rJointFrame,
+    const std::function<bool(std::size_t)>& i_rMirrorsChange = {});
 
 } // namespace RetargetSetup

@@ -6,6 +6,7 @@
 #include "OrlexGraphics/RenderManipulator.h"
 #include "OrlexGraphics/SkinCache.h"
 #include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupDocument/Mirror.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/StaleSelection.h"
 #include "TesselPluginInterface/ISelectionManager.h"
@@ -194,6 +195,28 @@ void VRetargetSetupScene::ComputeJointFrame(
 	o_rMatrix = RetargetSetup::JointFrame(parent, rSegment);
 }
 
+bool VRetargetSetupScene::MirrorsChange(std::size_t i_SegmentIndex, std::size_t i_MirrorIndex)
+{
+	const VRetargetSetup::VSubjectValues& rAtRest = m_pRetargetSetup->TargetAtRest();
+	if (!m_pRetargetSetup->HostRules().m_bMirrorChange || !rAtRest.m_pParametrised || !rAtRest.m_pSubject)
+		return false;
+	VMirrorRule& rRule = m_MirrorRule;
+	if (rRule.m_pAtRest == rAtRest.m_pParametrised && rRule.m_SegmentIndex == i_SegmentIndex)
+		return rRule.m_bMirrorsChange;
+	rRule.m_bTold = rRule.m_bTold && rRule.m_pAtRest == rAtRest.m_pParametrised;
+	rRule.m_pAtRest = rAtRest.m_pParametrised;
+	rRule.m_SegmentIndex = i_SegmentIndex;
+	rRule.m_bMirrorsChange = !RetargetSetup::AreMirrorImages(
+	    *rAtRest.m_pParametrised, *rAtRest.m_pSubject, i_SegmentIndex, i_MirrorIndex);
+	if (rRule.m_bMirrorsChange && !std::exchange(rRule.m_bTold, true))
+		NVX_LOG("RetargetSetup", NVX::ELogInformation,
+		    "The joints of '%1%' and '%2%' are no mirror images of each other at rest: joint symmetry mirrors what "
+		    "changes in a pose, not the whole pose",
+		    rAtRest.m_pParametrised->m_Segments[i_SegmentIndex].m_Name,
+		    rAtRest.m_pParametrised->m_Segments[i_MirrorIndex].m_Name);
+	return rRule.m_bMirrorsChange;
+}
+
 void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
 {
 	const VRetargetSetup::VSubjectValues target = m_pRetargetSetup->TargetValues();
@@ -215,7 +238,8 @@ void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
 		    QMatrix4x4 frame;
 		    ComputeJointFrame(frame, *target.m_pSubject, i_SegmentIndex);
 		    return frame;
-	    });
+	    },
+	    [&](std::size_t i_MirrorIndex) { return MirrorsChange(segment, i_MirrorIndex); });
 	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject));
 	RefreshScene();
 }

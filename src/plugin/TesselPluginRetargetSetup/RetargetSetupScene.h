@@ -1,6 +1,7 @@
 #pragma once
 
 #include "CoreOrlexTypes/Subject.h"
+#include "CoreOrlexTypes/SubjectParametrised.h"
 #include "Flow2Graphics/FlowScene.h"
 #include "NVX/Shared.h"
 #include "TesselPluginInterface/IItemFactory.h"
@@ -69,6 +70,18 @@ private:
 	void UpdateManipulator();
 	/// Tells of joints that cannot take the pose of the manipulator as it is.
 	void OnManipulatorPressed();
+	/// Whether the segment on the other side takes over the change of a pose rather than the pose: where the host's rules
+	/// want it, and the two are no mirror images of each other at rest. Told once for a character.
+	bool MirrorsChange(std::size_t i_SegmentIndex, std::size_t i_MirrorIndex);
+
+	/// The answer of MirrorsChange for one segment of one character, which a drag asks for again and again.
+	struct VMirrorRule
+	{
+		std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pAtRest;
+		std::size_t m_SegmentIndex = 0;
+		bool m_bMirrorsChange = false;
+		bool m_bTold = false;
+	};
 
 	const std::shared_ptr<VRetargetSetup> m_pRetargetSetup;
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
@@ -80,4 +93,5 @@ private:
 	bool m_bConnected = false;
 	/// -1 while the manipulator is hidden.
 	std::int64_t m_ManipulatedSegment = -1;
+	VMirrorRule m_MirrorRule;
 };
