@@ -230,6 +230,12 @@ TEST_F(RenderSubject, MarkersMissingAndPresent)
 	Make(subject, MakeData());
 	Update(&m_Pose, &labels);
 	EXPECT_TRUE(Data().m_MissingMarkers.empty()) << "it is known not to be worn";
+
+	subject = TestSubject::Make();
+	subject.m_Targets[TestSubject::EBody].m_SegmentIndices = {ELimb, ESpine};
+	Make(subject, MakeData());
+	Update(&m_Pose, &labels);
+	EXPECT_EQ(m_pSubject->SegmentHealth()[ELimb], 1.0f) << "of two segments nobody knows which lacks the marker";
 }
 
 TEST_F(RenderSubject, StaysWhereItWasWithoutAPose)

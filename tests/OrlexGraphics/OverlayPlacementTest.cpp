@@ -28,8 +28,8 @@ TEST(OverlayPlacement, KeepsLabelsInTheView)
 	    {"z up", {0, 0, -1000}, false, {0, -20}, 180.0, false},
 	    {"beyond the right edge", {1400, -300, -1000}, true, {70, 0}, 90.0, true},
 	    {"beyond the upper edge", {0, 2000, -1000}, true, {0, -70}, 180.0, true},
-
 	    {"behind, to the left", {-1400, 100, 1000}, true, {-70, 0}, -90.0, true},
+	    {"behind, above to the left", {-500, 500, 1000}, true, {-70, -56}, -128.6598, true},
 	};
 	for (const auto& rRow : rows)
 	{

@@ -216,10 +216,11 @@ TEST_P(RenderFloor, AnOpaqueFloorHidesWhatIsBelowATranslucentOneDoesNot)
 
 TEST_P(RenderFloor, AxesStandInTheCorner)
 {
-	for (const auto& [rViewport, rCorner] :
-	    {std::pair(QRect(0, 0, 600, 400), QRect(0, 0, 100, 100)), {QRect(0, 0, 4000, 3000), QRect(0, 0, 100, 100)},
-	        {QRect(10, 20, 300, 200), QRect(10, 20, 50, 50)}, {QRect(0, 0, 0, 0), QRect(0, 0, 0, 0)}})
-		EXPECT_EQ(VRenderAxis::Corner(rViewport), rCorner);
+	for (const auto& [rViewport, ratio, rCorner] : {std::tuple(QRect(0, 0, 600, 400), 1.0f, QRect(0, 0, 100, 100)),
+	         {QRect(0, 0, 4000, 3000), 1.0f, QRect(0, 0, 100, 100)},
+	         {QRect(0, 0, 4000, 3000), 2.0f, QRect(0, 0, 200, 200)},
+	         {QRect(10, 20, 300, 200), 2.0f, QRect(10, 20, 50, 50)}, {QRect(0, 0, 0, 0), 1.0f, QRect(0, 0, 0, 0)}})
+		EXPECT_EQ(VRenderAxis::Corner(rViewport, ratio), rCorner);
 
 	// From the right: Y points to the right, Z up, X at the eye.
 	m_Camera.m_Type = CoreGraphics::ECameraRight;

@@ -15,7 +15,7 @@ namespace
 {
 
 constexpr float c_Share = 0.25f;
-constexpr int c_LargestSide = 100;
+constexpr float c_LargestSide = 100.0f;
 
 } // namespace
 
@@ -26,11 +26,11 @@ VRenderAxis::VRenderAxis(CoreGraphics::VShaderLibrary& io_rLibrary)
 	m_State.m_DepthFunction = CoreGraphics::EDepthLessEqual;
 }
 
-QRect VRenderAxis::Corner(const QRect& i_rViewport)
+QRect VRenderAxis::Corner(const QRect& i_rViewport, float i_PixelRatio)
 {
-	const int side =
-	    static_cast<int>(static_cast<float>(std::min(i_rViewport.width(), i_rViewport.height())) * c_Share);
-	return {i_rViewport.topLeft(), QSize(std::min(side, c_LargestSide), std::min(side, c_LargestSide))};
+	const float share = static_cast<float>(std::min(i_rViewport.width(), i_rViewport.height())) * c_Share;
+	const int side = static_cast<int>(std::min(share, c_LargestSide * i_PixelRatio));
+	return {i_rViewport.topLeft(), QSize(side, side)};
 }
 
 void VRenderAxis::Render(
@@ -40,7 +40,7 @@ void VRenderAxis::Render(
 	    || !i_rOptions.m_OverlayCamera.empty())
 		return;
 	const QRect viewport = io_rContext.m_Viewport;
-	io_rContext.SetViewport(Corner(viewport));
+	io_rContext.SetViewport(Corner(viewport, io_rContext.m_PixelRatio));
 	if (io_rContext.UseProgram(m_pProgram))
 	{
 		io_rContext.ApplyState(m_State);

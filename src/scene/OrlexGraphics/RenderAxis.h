@@ -23,8 +23,9 @@ class VRenderAxis : public IRenderType
 public:
 	explicit VRenderAxis(CoreGraphics::VShaderLibrary& io_rLibrary);
 
-	/// The square that they are drawn in.
-	static QRect Corner(const QRect& i_rViewport);
+	/// The square that they are drawn in, in device pixels as the viewport is.
+	/// @param i_PixelRatio device pixels by those that sizes on the screen count in.
+	static QRect Corner(const QRect& i_rViewport, float i_PixelRatio);
 
 	void Render(
 	    CoreGraphics::VRenderContext& io_rContext, const VSceneOptions& i_rOptions, std::uint32_t i_Pass) override;

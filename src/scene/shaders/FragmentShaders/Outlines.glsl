@@ -35,7 +35,8 @@ void main()
 
 	if (touchingPrimary)
 	{
-		float hatching = step(0.5, fract(0.25 * (gl_FragCoord.x + gl_FragCoord.y)));
+		// One diagonal of four: the sum is whole, so that two of them come to 0.5 or above.
+		float hatching = fract(0.25 * (gl_FragCoord.x + gl_FragCoord.y)) > 0.5 ? 1.0 : 0.0;
 		gl_FragColor = vec4(u_PrimaryColour.rgb * (hatching + Intensity), Intensity);
 		return;
 	}
