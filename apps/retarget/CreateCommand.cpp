@@ -18,12 +18,14 @@ struct VCreateSettings
 	std::string m_Source;
 	std::optional<std::string> m_Root;
 	VOutput m_Out;
+	std::string m_RootHeight = "keep";
 };
 
 EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 {
 	CheckOutput(i_rSettings.m_Out, c_RetargetSubjectFile, {i_rSettings.m_Fbx, i_rSettings.m_Source});
 	VSession session;
+	session.Document().SetScaleRootHeight(i_rSettings.m_RootHeight == c_pScaleRootHeight);
 	// The target subject takes the source's name when it is made.
 	if (!i_rSettings.m_Source.empty())
 		session.LoadSource(i_rSettings.m_Source);
@@ -63,6 +65,7 @@ VCommand AddCreateCommand(CLI::App& io_rProgram)
 	    ->option_text("OUT.qrr")
 	    ->required();
 	AddForceOption(*pApp, pSettings->m_Out);
+	AddRootHeightOption(*pApp, pSettings->m_RootHeight);
 	AddEditOptions(*pApp, pEdits, true);
 	return {pApp, [pSettings, pEdits] { return Create(*pSettings, *pEdits); }};
 }

@@ -13,12 +13,14 @@ struct VEditSettings
 	std::string m_In;
 	std::string m_Source;
 	VOutput m_Out;
+	std::string m_RootHeight = "keep";
 };
 
 EExitStatus Edit(const VEditSettings& i_rSettings, const VEdits& i_rEdits)
 {
 	CheckOutput(i_rSettings.m_Out, c_RetargetSubjectFile, {i_rSettings.m_Source});
 	VSession session;
+	session.Document().SetScaleRootHeight(i_rSettings.m_RootHeight == c_pScaleRootHeight);
 	session.LoadTarget(i_rSettings.m_In);
 	if (!i_rSettings.m_Source.empty())
 		session.LoadSource(i_rSettings.m_Source);
@@ -46,6 +48,7 @@ VCommand AddEditCommand(CLI::App& io_rProgram)
 	    ->option_text("OUT.qrr")
 	    ->required();
 	AddForceOption(*pApp, pSettings->m_Out);
+	AddRootHeightOption(*pApp, pSettings->m_RootHeight);
 	AddEditOptions(*pApp, pEdits, false);
 	return {pApp, [pSettings, pEdits] { return Edit(*pSettings, *pEdits); }};
 }

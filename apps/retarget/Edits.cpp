@@ -354,6 +354,17 @@ void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits,
 	    ->group(c_pEditsGroup);
 }
 
+void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord)
+{
+	io_rApp
+	    .add_option("--root-height", o_rWord,
+	        "What the scale does to the height of the root above the floor: keep leaves it, scale scales it, too, so "
+	        "that "
+	        "the feet stay on the floor")
+	    ->option_text("keep|scale")
+	    ->check(CLI::IsMember({"keep", c_pScaleRootHeight}));
+}
+
 void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
 {
 	for (const VEdit& rEdit : i_rEdits)

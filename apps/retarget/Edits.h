@@ -37,6 +37,11 @@ using VEdits = std::vector<VEdit>;
 /// Adds the options of all edits to a command; parsing appends to the list.
 void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits, bool i_bOfCreate);
 
+/// "--root-height", which is no edit: it counts for all of them.
+/// @param o_rWord must outlive the parsing.
+void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord);
+inline constexpr const char* c_pScaleRootHeight = "scale";
+
 /// Runs them in order, with the document's callbacks after each. Throws VCommandError with EFindings if --symmetry
 /// found no partner for a target of one side.
 void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits);

@@ -7,6 +7,7 @@
 #include "CoreOrlexTypes/TextForm.h"
 #include "InMemoryHost/Application.h"
 #include "RetargetSetupDocument/FilePath.h"
+#include "RetargetSetupDocument/RootHeight.h"
 
 #include <boost/filesystem/operations.hpp>
 
@@ -222,6 +223,41 @@ TEST_F(Flow, ThePoseOfTheFileAtOnceOrByItsCommand)
 	m_Document.MatchFilePose();
 	EXPECT_FALSE(m_Document.DifferenceFromFile());
 	EXPECT_TRUE(Target() == byCommand);
+}
+
+TEST_F(Flow, TheScaleLeavesTheRootWhereItIsOrTakesItAlong)
+{
+	// Of a root with a pre-rotation, whose joint has other axes than the world.
+	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_TEST_DATA "/fbx/pab_arnaud_b7500.fbx"));
+	m_Document.CreateTargetSubject();
+	m_Document.MatchFilePose();
+	const auto lowest = [&] { return RetargetSetup::FindLowestSegment(Target()).value().m_Height; };
+	const double height = lowest();
+	const double root =
+	    double((m_Document.GetTargetAxisMatrix() * m_Document.GetFBXSkeleton()->front().m_Global)(2, 3));
+	ASSERT_GT(root, 800.0);
+	VLogRecorder log;
+	m_Document.SetTargetScale(0.5);
+	EXPECT_NEAR(lowest(), root + 0.5 * (height - root), 0.01);
+	EXPECT_NE(log.Take().find("mm above the floor, and at scale 1 it is"), std::string::npos);
+	m_Document.SetScaleRootHeight(true);
+	EXPECT_NEAR(lowest(), 0.5 * height, 0.01) << "at once";
+	m_Document.SetTargetScale(2.0);
+	EXPECT_NEAR(lowest(), 2.0 * height, 0.01);
+	EXPECT_FALSE(m_Document.DifferenceFromFile());
+	m_Document.MatchFilePose();
+	EXPECT_NEAR(lowest(), 2.0 * height, 0.01);
+	EXPECT_EQ(log.Take(), "");
+	m_Document.SetScaleRootHeight(false);
+	EXPECT_NEAR(lowest(), root + 2.0 * (height - root), 0.01);
+	EXPECT_NE(log.Take().find("mm below the floor, and at scale 1 it is"), std::string::npos);
+	for (const bool bScale : {false, true})
+	{
+		m_Document.SetScaleRootHeight(bScale);
+		log.Take();
+		m_Document.CreateTargetSubject();
+		EXPECT_EQ(log.Take().find("the lowest segment") != std::string::npos, !bScale);
+	}
 }
 
 TEST_F(Flow, AnFBXFileThatGivesNoSkeleton)

@@ -132,6 +132,20 @@ TEST_F(Edit, StatesAreTakenAtThePresentScale)
 	EXPECT_TRUE(targets[1].at("distance").is_null());
 }
 
+TEST_F(Edit, TheRootsHeightIsKeptOrScaled)
+{
+	const auto height = [&] { return Subject().at("Segments")[0].at("Joint").at("BindPose")[5].get<double>(); };
+	Create({});
+	const double before = height();
+	const std::string told = Create({"--scale", "0.5"}).m_Err;
+	EXPECT_NE(told.find("warning RetargetSetup: At scale 0.5 the lowest segment, "), std::string::npos) << told;
+	EXPECT_EQ(height(), before);
+	EXPECT_EQ(Create({"--scale", "0.5", "--root-height", "scale"}).m_Err.find("lowest segment"), std::string::npos);
+	EXPECT_NEAR(height(), 0.5 * before, 1e-6);
+	EXPECT_EQ(m_Folder.Run({"edit", "x.qrr", "--root-height", "scale", "--scale", "2", "-o", "x.qrr"}).m_Status, 0);
+	EXPECT_NEAR(height(), 2.0 * before, 1e-5);
+}
+
 TEST_F(Edit, ResidualsFollowThePoseUntilTheTargetsAreUpdated)
 {
 	Create({"--rotation", "Spine:Spine", "--position", "Head:Head"});

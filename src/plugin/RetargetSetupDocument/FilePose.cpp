@@ -116,16 +116,23 @@ FBXIO::VSkinSkeleton BonesOfSegments(
 	return {};
 }
 
-std::vector<VPose<double>> PosesInFile(const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_Scale)
+std::vector<VPose<double>> PosesInFile(
+    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_Scale, double i_RootFactor)
 {
 	std::vector<VPose<double>> poses;
+	VVector3 root{};
 	for (const FBXIO::VSkinBone& rBone : i_rBones)
 	{
 		const QMatrix4x4 world = i_rAxis * rBone.m_Global;
 		VPose<double> pose{RotationWithoutScale(world), Column(world, 3)};
-		if (!poses.empty())
+		if (poses.empty())
 		{
-			const VVector3 fromRoot = Times(i_Scale, Minus(pose.t, poses.front().t));
+			root = pose.t;
+			pose.t[2] *= i_RootFactor;
+		}
+		else
+		{
+			const VVector3 fromRoot = Times(i_Scale, Minus(pose.t, root));
 			for (std::size_t i = 0; i < 3; ++i)
 				pose.t[i] = poses.front().t[i] + fromRoot[i];
 		}
@@ -134,8 +141,8 @@ std::vector<VPose<double>> PosesInFile(const FBXIO::VSkinSkeleton& i_rBones, con
 	return poses;
 }
 
-VFileMatch MatchFilePose(
-    VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis)
+VFileMatch MatchFilePose(VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones,
+    const QMatrix4x4& i_rAxis, double i_RootFactor)
 {
 	VFileMatch match;
 	if (io_rSubject.m_DynamicParameters.empty() || io_rSubject.m_Segments.size() != i_rBones.size())
@@ -145,7 +152,7 @@ VFileMatch MatchFilePose(
 	SetGlobalScale(atFileSize, 1.0);
 	CoreOrlexTypes::VSubject subject;
 	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(atFileSize, subject);
-	const std::vector<VPose<double>> poses = PosesInFile(i_rBones, i_rAxis, 1.0);
+	const std::vector<VPose<double>> poses = PosesInFile(i_rBones, i_rAxis, 1.0, i_RootFactor);
 	const std::string& rScaleName = io_rSubject.m_DynamicParameters.back().m_Name;
 
 	for (std::size_t i = 0; i < poses.size(); ++i)
@@ -200,13 +207,14 @@ bool HoldsFilePose(const VSubjectParametrised& i_rSubject)
 	    && i_rSubject.m_DynamicParameters.front().m_Name == c_GlobalScaleName;
 }
 
-std::optional<VPoseDifference> DifferenceFromFile(
-    const VSubjectParametrised& i_rSubject, const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis)
+std::optional<VPoseDifference> DifferenceFromFile(const VSubjectParametrised& i_rSubject,
+    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_RootFactor)
 {
 	CoreOrlexTypes::VSubject subject;
 	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(i_rSubject, subject);
 	const auto pFK = KinematicsInBindPose(i_rSubject, subject, "target");
-	return pFK ? WorstPoseDifference(PosesInFile(i_rBones, i_rAxis, GetGlobalScale(i_rSubject)), SegmentPoses(*pFK))
+	return pFK ? WorstPoseDifference(
+	           PosesInFile(i_rBones, i_rAxis, GetGlobalScale(i_rSubject), i_RootFactor), SegmentPoses(*pFK))
 	           : std::nullopt;
 }
 
@@ -218,10 +226,10 @@ std::string WorstText(const VSubjectParametrised& i_rSubject, const VPoseDiffere
 	    .str();
 }
 
-void MatchFilePoseAndTell(
-    VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis)
+void MatchFilePoseAndTell(VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones,
+    const QMatrix4x4& i_rAxis, double i_RootFactor)
 {
-	const VFileMatch match = MatchFilePose(io_rSubject, i_rBones, i_rAxis);
+	const VFileMatch match = MatchFilePose(io_rSubject, i_rBones, i_rAxis, i_RootFactor);
 	if (!match.m_Lengths.empty())
 		NVX_LOG(c_LogCategory, NVX::ELogInformation, "Pose from the FBX file: %1% segments got the file's lengths",
 		    match.m_Lengths.size());
@@ -229,7 +237,7 @@ void MatchFilePoseAndTell(
 		NVX_LOG(c_LogCategory, NVX::ELogInformation, "Pose from the FBX file: %1% segments without a joint were turned",
 		    match.m_PreRotations.size());
 	// What lengths within a thousandth of the file's add up to is no concern.
-	if (const auto worst = DifferenceFromFile(io_rSubject, i_rBones, i_rAxis))
+	if (const auto worst = DifferenceFromFile(io_rSubject, i_rBones, i_rAxis, i_RootFactor))
 		NVX_LOG(c_LogCategory,
 		    worst->m_Distance > 1.0 || worst->m_Angle > 1e-3 ? NVX::ELogWarning : NVX::ELogInformation,
 		    "The bind pose still differs from the pose in the FBX file, %1%", WorstText(io_rSubject, *worst));

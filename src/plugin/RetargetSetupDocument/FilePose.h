@@ -26,8 +26,9 @@ FBXIO::VSkinSkeleton BonesOfSegments(const CoreOrlexTypes::VSubjectParametrised&
 /// with the same X and Y axes. Distances from the root are multiplied by the scale, as the segments' lengths are.
 /// @param i_rBones the root and all below it, as ExtractSubtree gives them.
 /// @param i_rAxis turns the file's space into the system's Z-up space.
+/// @param i_RootFactor multiplies the height of the root above the floor.
 std::vector<Rotation::VPose<double>> PosesInFile(
-    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_Scale);
+    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_Scale, double i_RootFactor = 1.0);
 
 /// What MatchFilePose changed beside bind poses: indices of segments.
 struct VFileMatch
@@ -42,24 +43,25 @@ struct VFileMatch
 /// times the scale parameter; and the pre-rotation of a segment without a joint takes up its rotation.
 /// @param io_rSubject HoldsFilePose must be true of it.
 /// @param i_rBones as BonesOfSegments gives them.
-VFileMatch MatchFilePose(
-    CoreOrlexTypes::VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis);
+/// @param i_RootFactor multiplies the height of the root above the floor.
+VFileMatch MatchFilePose(CoreOrlexTypes::VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones,
+    const QMatrix4x4& i_rAxis, double i_RootFactor = 1.0);
 
-/// True of a subject as CreateTargetSubject makes it, pruned or not: a free root, below it ball joints or none, no joint
-/// orientations, no post poses, and no dynamic parameter beside the scale.
+/// True of a subject as CreateTargetSubject makes it, pruned or not: a free root, below it ball joints or none, no
+/// joint orientations, no post poses, and no dynamic parameter beside the scale.
 bool HoldsFilePose(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
 
 /// The segment that stands farthest from its bone in the file, at the subject's scale; nothing if all stand where their
 /// bones do.
 std::optional<VPoseDifference> DifferenceFromFile(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
-    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis);
+    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_RootFactor);
 
 /// "at worst "Head" by 12.3 mm and 4.5 degrees".
 std::string WorstText(const CoreOrlexTypes::VSubjectParametrised& i_rSubject, const VPoseDifference& i_rWorst);
 
 /// MatchFilePose, with what it changed and what it could not reach told in the log.
-void MatchFilePoseAndTell(
-    CoreOrlexTypes::VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis);
+void MatchFilePoseAndTell(CoreOrlexTypes::VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones,
+    const QMatrix4x4& i_rAxis, double i_RootFactor);
 
 /// A root that stands turned because the pre-rotation of its bone counts twice: in its segment, and in the bone's place
 /// in the world that is its bind pose.

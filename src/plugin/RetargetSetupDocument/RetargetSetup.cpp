@@ -6,6 +6,7 @@
 #include "RetargetSetupDocument/GlobalScale.h"
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/IgnoredCommands.h"
+#include "RetargetSetupDocument/RootHeight.h"
 
 #include <algorithm>
 
@@ -106,7 +107,11 @@ void VRetargetSetup::SetTargetScale(double i_Scale)
 	if (!dropped.empty())
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The new scale drops the dynamic parameters '%1%'", dropped);
 	VSubjectParametrised subject = *pOld;
+	const double factor = RootFactor(i_Scale) / RootFactor(RetargetSetup::GetGlobalScale(subject));
 	RetargetSetup::SetGlobalScale(subject, i_Scale);
+	if (factor != 1.0)
+		RetargetSetup::ScaleRootHeight(subject, factor);
+	RetargetSetup::TellLowestSegment(subject, RootFactor(i_Scale));
 	SetTargetSubjectParametrised(std::move(subject));
 }
 

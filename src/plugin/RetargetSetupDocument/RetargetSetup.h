@@ -45,8 +45,11 @@ class VRetargetSetup : public QObject
 	Q_PROPERTY(bool jointSymmetry READ JointSymmetry WRITE SetJointSymmetry NOTIFY jointSymmetryChanged)
 	/// Read by whoever marks the file's name.
 	Q_PROPERTY(bool unsavedChanges READ HasUnsavedChanges NOTIFY unsavedChangesChanged)
-	/// Why the target subject lies or stands askew as it was made, a sentence for the operator; empty if it does not, or
-	/// if its FBX file is not the one that was read last.
+	/// The height of the root above the floor is scaled with the lengths: at once when this changes, and whenever the
+	/// scale does.
+	Q_PROPERTY(bool scaleRootHeight READ ScaleRootHeight WRITE SetScaleRootHeight NOTIFY scaleRootHeightChanged)
+	/// Why the target subject lies or stands askew as it was made, a sentence for the operator; empty if it does not,
+	/// or if its FBX file is not the one that was read last.
 	Q_PROPERTY(QString poseNote READ PoseNote NOTIFY poseNoteChanged)
 
 public:
@@ -101,6 +104,9 @@ public:
 
 	bool JointSymmetry() const { return m_bJointSymmetry; }
 	void SetJointSymmetry(bool i_bJointSymmetry);
+
+	bool ScaleRootHeight() const { return m_bScaleRootHeight; }
+	void SetScaleRootHeight(bool i_bScale);
 
 	/// Reads the skeleton that CreateTargetSubject uses; no subject changes. False if the file cannot be read, then the
 	/// old skeleton stays, and if it has no skeleton.
@@ -213,6 +219,7 @@ public:
 signals:
 	void jointSymmetryChanged();
 	void poseNoteChanged();
+	void scaleRootHeightChanged();
 
 	/// With each change of the target subject and each save.
 	void unsavedChangesChanged();
@@ -284,6 +291,8 @@ private:
 	/// made of another file.
 	FBXIO::VSkinSkeleton BonesOfTarget() const;
 	void UpdatePoseNote();
+	/// What the root's height is multiplied by at a scale.
+	double RootFactor(double i_Scale) const { return m_bScaleRootHeight ? i_Scale : 1.0; }
 
 	static VSubjectValues ValuesOf(const VSubjectItems& i_rItems);
 
@@ -321,6 +330,7 @@ private:
 	double m_TargetScale = 1.0;
 	[[maybe_unused]] bool m_bSpare = false;
 	bool m_bJointSymmetry = true;
+	bool m_bScaleRootHeight = false;
 	NVX::VSignal<> m_ChangedSignal;
 
 	/// What the file held when it was last loaded or saved.

@@ -15,6 +15,7 @@
 #include "RetargetSetupDocument/IgnoredCommands.h"
 #include "RetargetSetupDocument/LegacyText.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/RootHeight.h"
 #include "RetargetSetupDocument/TargetConstruction.h"
 #include "UtilsFileSystem/Paths.h"
 
@@ -187,6 +188,7 @@ void VRetargetSetup::CreateTargetSubject()
 	const FBXIO::VSkinSkeleton bones = RetargetSetup::ExtractSubtree(*pSkeleton, m_TargetRootIndex);
 	const bool bRootChosen = m_bTargetRootChosen;
 	const bool bPoseFromFile = HostRules().m_bPoseFromFile;
+	const double rootFactor = RootFactor(RetargetSetup::GetGlobalScale(subject));
 	if (!MayReplaceTarget(c_Command, "Create Target Subject"))
 		return;
 	if (!bRootChosen)
@@ -211,7 +213,10 @@ void VRetargetSetup::CreateTargetSubject()
 		rJoint.m_BindPose[std::size_t(3 + row)] = double(world(row, 3));
 	rJoint.m_Mean = rJoint.m_BindPose;
 	if (bPoseFromFile)
-		RetargetSetup::MatchFilePoseAndTell(subject, bones, axis);
+		RetargetSetup::MatchFilePoseAndTell(subject, bones, axis, rootFactor);
+	else if (rootFactor != 1.0)
+		RetargetSetup::ScaleRootHeight(subject, rootFactor);
+	RetargetSetup::TellLowestSegment(subject, rootFactor);
 	if (!SetTargetSubject(std::move(subject), std::move(applicationData)))
 		return Ignore(c_Command, Ignored::c_HostRefused);
 	m_MadeTarget = TargetValues();

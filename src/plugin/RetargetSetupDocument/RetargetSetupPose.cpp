@@ -5,6 +5,7 @@
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/IgnoredCommands.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/RootHeight.h"
 
 #include <cmath>
 #include <numbers>
@@ -27,7 +28,8 @@ std::optional<RetargetSetup::VPoseDifference> VRetargetSetup::DifferenceFromFile
 	const FBXIO::VSkinSkeleton bones = BonesOfTarget();
 	if (bones.empty())
 		return std::nullopt;
-	return RetargetSetup::DifferenceFromFile(*TargetValues().m_pParametrised, bones, m_TargetAxisMatrix);
+	return RetargetSetup::DifferenceFromFile(
+	    *TargetValues().m_pParametrised, bones, m_TargetAxisMatrix, RootFactor(GetTargetScale()));
 }
 
 void VRetargetSetup::MatchFilePose()
@@ -44,9 +46,26 @@ void VRetargetSetup::MatchFilePose()
 	if (!RetargetSetup::HoldsFilePose(*target.m_pParametrised))
 		return Ignore(c_Command, Ignored::c_OwnJoints);
 	VSubjectParametrised subject = *target.m_pParametrised;
-	RetargetSetup::MatchFilePoseAndTell(subject, bones, m_TargetAxisMatrix);
+	RetargetSetup::MatchFilePoseAndTell(subject, bones, m_TargetAxisMatrix, RootFactor(GetTargetScale()));
 	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData))
 		m_TargetAtRest = TargetValues();
+}
+
+void VRetargetSetup::SetScaleRootHeight(bool i_bScale)
+{
+	if (i_bScale == m_bScaleRootHeight)
+		return;
+	const double scale = GetTargetScale();
+	const double before = RootFactor(scale);
+	m_bScaleRootHeight = i_bScale;
+	emit scaleRootHeightChanged();
+	const auto pTarget = TargetValues().m_pParametrised;
+	if (!pTarget || scale == 1.0)
+		return;
+	VSubjectParametrised subject = *pTarget;
+	RetargetSetup::ScaleRootHeight(subject, RootFactor(scale) / before);
+	RetargetSetup::TellLowestSegment(subject, RootFactor(scale));
+	SetTargetSubjectParametrised(std::move(subject));
 }
 
 void VRetargetSetup::UpdatePoseNote()
@@ -55,8 +74,8 @@ void VRetargetSetup::UpdatePoseNote()
 	QString note;
 	if (m_pFBXSkeleton && target.m_pParametrised && target.m_pApplicationData
 	    && target.m_pApplicationData->m_Skin == m_TargetName)
-		if (const auto turned
-		    = RetargetSetup::FindTurnedRoot(*target.m_pParametrised, *m_pFBXSkeleton, m_TargetAxisMatrix))
+		if (const auto turned =
+		        RetargetSetup::FindTurnedRoot(*target.m_pParametrised, *m_pFBXSkeleton, m_TargetAxisMatrix))
 			note = QStringLiteral("The character stands turned by %1 degrees against its FBX file: the pre-rotation of "
 			                      "its root bone '%2' counts twice.")
 			           .arg(std::lround(turned->m_Angle * 180.0 / std::numbers::pi))

@@ -275,8 +275,9 @@ Rectangle {
 
 					readonly property real minimumWidth: Math.ceil(Math.max(fileButtons.implicitWidth,
 						jointControls.implicitWidth, addControls.implicitWidth)) + 2 * Theme.margin + leftBar.width
-					// The two boxes stand below each other.
-					readonly property real symmetryWidth: Math.max(jointSymmetry.implicitWidth, targetSymmetry.implicitWidth)
+					// The boxes stand below each other.
+					readonly property real symmetryWidth: Math.max(jointSymmetry.implicitWidth, targetSymmetry.implicitWidth,
+						scaleRootHeight.implicitWidth)
 
 					x: Theme.margin
 					y: Theme.margin
@@ -444,6 +445,15 @@ Rectangle {
 							text: "Update targets"
 							toolTip: "Recalculate offsets to each target based on the current pose"
 							onClicked: retargetSetup.run(() => ContextRetargetSetup.UpdateTargets())
+						}
+						PropertyCheckBox {
+							id: scaleRootHeight
+							objectName: "scaleRootHeight"
+							Layout.preferredWidth: leftColumn.symmetryWidth
+							text: "Scale root height"
+							toolTip: "Scale the height of the root above the floor, too, so that the feet stay on it"
+							target: ContextRetargetSetup
+							property: "scaleRootHeight"
 						}
 					}
 
