@@ -299,6 +299,8 @@ TEST_F(Preview, SelectsLikeTheLists)
 	m_Eye.Pan({0, 90});
 	rOperator.Wheel(10);
 	m_Eye.m_Distance *= std::pow(0.9, 10);
+	// Its handles would stand before the bones beside the selected one.
+	rOperator.Click("showManipulator");
 	using VBone = std::pair<const char*, const char*>;
 	const VBone left{"L_Radius", "L_Hand"}, right{"R_Radius", "R_Hand"}, target{"foreArmRight", "palmRight"}, nothing{};
 	struct VRow

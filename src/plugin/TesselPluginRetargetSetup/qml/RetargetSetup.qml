@@ -275,9 +275,8 @@ Rectangle {
 
 					readonly property real minimumWidth: Math.ceil(Math.max(fileButtons.implicitWidth,
 						jointControls.implicitWidth, addControls.implicitWidth)) + 2 * Theme.margin + leftBar.width
-					// The boxes stand below each other.
-					readonly property real symmetryWidth: Math.max(jointSymmetry.implicitWidth, targetSymmetry.implicitWidth,
-						scaleRootHeight.implicitWidth)
+					// The two boxes stand below each other.
+					readonly property real symmetryWidth: Math.max(jointSymmetry.implicitWidth, targetSymmetry.implicitWidth)
 
 					x: Theme.margin
 					y: Theme.margin
@@ -447,9 +446,7 @@ Rectangle {
 							onClicked: retargetSetup.run(() => ContextRetargetSetup.UpdateTargets())
 						}
 						PropertyCheckBox {
-							id: scaleRootHeight
 							objectName: "scaleRootHeight"
-							Layout.preferredWidth: leftColumn.symmetryWidth
 							text: "Scale root height"
 							toolTip: "Scale the height of the root above the floor, too, so that the feet stay on it"
 							target: ContextRetargetSetup
