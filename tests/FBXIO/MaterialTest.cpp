@@ -32,7 +32,8 @@ protected:
 
 	/// The parts of two triangles with these materials.
 	std::vector<VMeshPart> Read(const std::vector<VTestMaterial>& i_rMaterials,
-	    const VTestLayer& i_rLayer = {"AllSame", "IndexToDirect", {}, {0}}, const VTestLayer& i_rTextures = {})
+	    const VTestLayer& i_rLayer = {"AllSame", "IndexToDirect", {}, {0}}, const VTestLayer& i_rTextures = {},
+	    const VMeshRules& i_rRules = {})
 	{
 		const VTestScene scene{{{"body", "Mesh", -1, {}}}, {}, {}, {}};
 		Put(Path("hero.fbx"),
@@ -40,7 +41,9 @@ protected:
 		        {{0, {0, 0, 0, 1, 0, 0, 0, 1, 0}, {0, 1, -3, 0, 2, -2}, {}, {}, i_rLayer, i_rMaterials, {},
 		            i_rTextures}}));
 		FBXReader reader;
-		reader.SetMeshRules({EVertexKey::UVIndex, m_Pictures});
+		VMeshRules rules = i_rRules;
+		rules.m_Pictures = m_Pictures;
+		reader.SetMeshRules(rules);
 		EXPECT_TRUE(reader.LoadFile(Path("hero.fbx")));
 		VBasicMesh mesh;
 		reader.ReadTopMesh(mesh);
@@ -248,6 +251,39 @@ TEST_P(Material, OfAnUnknownClassHasNoTexture)
 	ASSERT_NE(parts[1].m_pTexture, nullptr);
 	EXPECT_EQ(parts[1].m_pTexture->width(), 3);
 	EXPECT_TRUE(m_Failed.Take().empty());
+}
+
+TEST_P(Material, OfAnUnknownClassMayShowItsBaseColour)
+{
+	WritePicture("skin.png", 3);
+	const QVector4D white(1, 1, 1, 1);
+	const struct
+	{
+		std::vector<std::pair<std::string, VNumbers>> m_Properties;
+		QVector4D m_Diffuse;
+		const char* m_pTextured = "";
+	} rows[]{{{{"Maya|baseColor", {0.25, 0.5, 1}}}, {0.25f, 0.5f, 1, 1}},
+	    {{{"DiffuseColor", {1, 0, 0}}, {"3dsMax|main|basecolor", {0, 0.5, 1, 1}}, {"Diffuse", {0, 0, 1}}},
+	        {0, 0.5f, 1, 1}},
+	    {{{"3dsMax|Parameters|base_color", {0, 0.5, 1}}}, white, "3dsMax|main|base_color_map"},
+	    {{}, white, "Maya|TEX_color_map"},
+	    {{{"Maya|baseColorWeight", {0, 0, 0}}}, {1.0f, 0.8f, 0.8f, 1.0f}, "Maya|normalCamera"}};
+	for (const auto& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pTextured);
+		if (*rRow.m_pTextured && GetParam().m_Version < 7000)
+			continue;
+		VTestLog log("FBXIO");
+		const std::vector<VMeshPart> parts =
+		    Read({{"unknown", rRow.m_Properties, *rRow.m_pTextured ? Path("skin.png") : "", "", {}, rRow.m_pTextured}},
+		        {"AllSame", "IndexToDirect", {}, {0}}, {}, c_FaithfulMeshes);
+		ASSERT_EQ(parts.size(), 1u);
+		EXPECT_EQ(parts[0].m_Diffuse, rRow.m_Diffuse);
+		EXPECT_EQ(parts[0].m_pTexture != nullptr, rRow.m_Diffuse == white);
+		EXPECT_NE(log.Take().back().find(
+		              &rRow == &rows[4] ? "are drawn in the default colour" : "; their base colour and its texture"),
+		    std::string::npos);
+	}
 }
 
 } // namespace

@@ -108,7 +108,7 @@ void AddMaterials(const VTestForm& i_rForm, const VTestValue& i_rNode, VObjects&
 			io_rObjects.Connect(io_rObjects.Add("Video", "video" + name, "Clip", {std::move(content)}), texture);
 		}
 		if (i_rForm.m_Version >= 7000)
-			io_rObjects.Connect(texture, key, "DiffuseColor");
+			io_rObjects.Connect(texture, key, rMaterial.m_Property.c_str());
 		else
 			io_rObjects.Connect(texture, i_rNode);
 	}

@@ -24,6 +24,8 @@ struct VTestMaterial
 	std::string m_RelativeName;
 	/// Of the picture, which stands in the file.
 	std::string m_Content{};
+	/// What the texture is connected to, since version 7.
+	std::string m_Property = "DiffuseColor";
 };
 
 struct VTestCluster

@@ -176,7 +176,8 @@ TEST_P(Mesh, PartsByMaterial)
 	const std::vector<std::uint32_t> both{0, 1, 2, 0, 2, 3, 3, 2, 0};
 	const VPartsRow rows[]{
 	    {"ByPolygon", {"ByPolygon", "IndexToDirect", {}, {1, 0, 0}}, 2, {triangle, quad}, {}},
-	    {"BeyondThePartsIsDropped", {"ByPolygon", "IndexToDirect", {}, {7, 0, 1}}, 2, {{}, triangle}, {}},
+	    {"BeyondThePartsIsDropped", {"ByPolygon", "IndexToDirect", {}, {7, 0, 1}}, 2, {{}, triangle},
+	        {"3 1 polygons of PATH are left out because their material is beyond the list of their node"}},
 	    {"BelowZeroIsTheFirst", {"ByPolygon", "IndexToDirect", {}, {1, 0, -3}}, 2, {triangle, quad}, {}},
 	    {"AllSame", {"AllSame", "IndexToDirect", {}, {1}}, 2, {both, {}}, {}},
 	    {"AnotherLengthIsNoList", {"ByPolygon", "IndexToDirect", {}, {1, 1}}, 2, {both, {}}, {}},
@@ -310,6 +311,27 @@ TEST_P(Mesh, TopMeshIsTheLastThatHasNoneAbove)
 	reader.ReadSkin(skin);
 	EXPECT_EQ(skin.m_pSkeleton, nullptr) << "a file without bones has no skin";
 	EXPECT_TRUE(skin.m_Meshes.empty());
+}
+
+TEST_P(Mesh, GeometricTransformsAreTold)
+{
+	VTestScene scene = OneMesh();
+	scene.m_Nodes[0].m_Properties = {
+	    {"Lcl Scaling", {2, 2, 2}}, {"GeometricTranslation", {0, 0, 3}}, {"GeometricRotation", {0, 0, 90}}};
+	const std::string file = Write(GetParam(), scene, {{0, c_Square, c_Quad, {}, {}, c_OneMaterial, {}, {}}});
+	FBXReader reader;
+	ASSERT_TRUE(reader.LoadMemory(file, "PATH"));
+	for (const char* pMessage : {"3 1 meshes of PATH are drawn without their geometric transform, which would move "
+	                             "them by up to 100.0 mm. Apply it in the program that wrote the file",
+	         ""})
+	{
+		std::vector<VPlacedMesh> placed;
+		reader.ReadPlacedMeshes(placed);
+		ASSERT_EQ(placed.size(), 1u);
+		EXPECT_EQ(placed[0].m_Mesh.m_Vertices.at(2).m_Position, (std::array<float, 3>{20, 20, 0}));
+		// Twice as large: the far corner goes from (40, 40, 0) to (-40, 40, 60).
+		EXPECT_EQ(Told(m_Log), *pMessage ? VMessages{pMessage} : VMessages());
+	}
 }
 
 TEST_P(Mesh, PlaceThatIsNotFiniteIsTheIdentity)

@@ -12,6 +12,7 @@
 #include <cmath>
 #include <future>
 #include <map>
+#include <utility>
 
 namespace
 {
@@ -37,6 +38,17 @@ std::string ContentOf(const TTexture& i_rTexture)
 		return {};
 }
 
+/// Of a material that is neither Phong nor Lambert; null if the file names none. The SDK knows its properties by the
+/// names alone that its exporter gave them.
+template <typename TMaterial>
+const FbxPropertyT<FbxDouble3>* BaseColourOf(const TMaterial& i_rMaterial)
+{
+	if constexpr (requires { i_rMaterial.GetBaseColor(); })
+		return i_rMaterial.GetBaseColor();
+	else
+		return nullptr;
+}
+
 FbxSkin* FindSkin(FbxNode& i_rNode)
 {
 	FbxGeometry* const pGeometry = FBXMeshReader::IsMesh(i_rNode) ? i_rNode.GetGeometry() : nullptr;
@@ -51,6 +63,19 @@ void ForEachCluster(FbxSkin& i_rSkin, TVisit&& i_Visit)
 		if (FbxCluster* const pCluster = i_rSkin.GetCluster(i);
 		    pCluster && pCluster->GetLink() && pCluster->GetControlPointIndicesCount() > 0)
 			i_Visit(*pCluster);
+}
+
+/// Millimetres, below which nobody sees a difference, and the same of a matrix's linear part.
+constexpr float c_SeenDistance = 0.1f;
+constexpr float c_SeenTurn = 1e-3f;
+
+bool AreSeenToDiffer(const QMatrix4x4& i_rA, const QMatrix4x4& i_rB)
+{
+	for (int row = 0; row < 3; ++row)
+		for (int column = 0; column < 4; ++column)
+			if (std::abs(i_rA(row, column) - i_rB(row, column)) > (column < 3 ? c_SeenTurn : c_SeenDistance))
+				return true;
+	return false;
 }
 
 /// The number of control points from which a second thread is worth its start.
@@ -71,10 +96,18 @@ void FBXIO::FBXMeshReader::SetFile(const std::string& i_rPath, std::uint64_t i_B
 	m_Images.SetFileBytes(i_Bytes);
 }
 
+void FBXIO::FBXMeshReader::SetRules(const VMeshRules& i_rRules)
+{
+	m_Rules = i_rRules;
+	m_Images.SetPictures(i_rRules.m_Pictures);
+	m_PartOfMaterial.clear();
+}
+
 void FBXIO::FBXMeshReader::SetSkeleton(std::shared_ptr<VSkinSkeleton> i_pSkeleton)
 {
 	m_pSkeleton = std::move(i_pSkeleton);
 	m_BoneOfName.clear();
+	m_BoundBones.clear();
 	if (m_pSkeleton)
 		for (std::size_t i = 0; i < m_pSkeleton->size(); ++i)
 			m_BoneOfName.insert_or_assign((*m_pSkeleton)[i].m_Name, std::int64_t(i));
@@ -126,7 +159,27 @@ void FBXIO::FBXMeshReader::Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TV
 }
 
 template <typename TVertex>
-void FBXIO::FBXMeshReader::Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VSeams* i_pSeams, VMesh<TVertex>& io_rMesh)
+void FBXIO::FBXMeshReader::FindGeometric(FbxNode& i_rNode, const FbxAMatrix& i_rPlace, const VMesh<TVertex>& i_rMesh)
+{
+	QMatrix4x4 moved = SystemMatrix(FbxAMatrix(i_rNode.GetGeometricTranslation(FbxNode::eSourcePivot),
+	    i_rNode.GetGeometricRotation(FbxNode::eSourcePivot), i_rNode.GetGeometricScaling(FbxNode::eSourcePivot)));
+	ScaleTranslation(moved, m_UnitScale);
+	if (moved.isIdentity())
+		return;
+	const QMatrix4x4 place = SystemMatrix(i_rPlace);
+	float farthest = 0.0f;
+	for (const TVertex& rVertex : i_rMesh.m_Vertices)
+	{
+		const QVector3D point(rVertex.m_Position[0], rVertex.m_Position[1], rVertex.m_Position[2]);
+		farthest = std::max(farthest, place.mapVector(moved.map(point) - point).length());
+	}
+	m_Findings.m_Geometric += farthest >= c_SeenDistance ? 1 : 0;
+	m_Findings.m_GeometricDistance = std::max(m_Findings.m_GeometricDistance, farthest);
+}
+
+template <typename TVertex>
+void FBXIO::FBXMeshReader::Finish(
+    FbxNode& i_rNode, FbxMesh& io_rFrom, const FbxAMatrix& i_rPlace, VSeams* i_pSeams, VMesh<TVertex>& io_rMesh)
 {
 	// A mesh may be read placed and once more with its skin.
 	const bool bTell = m_Told.insert(&i_rNode).second;
@@ -134,13 +187,15 @@ void FBXIO::FBXMeshReader::Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VSeams* i
 	std::vector<std::uint32_t> indices(pVertices, pVertices + io_rFrom.GetPolygonVertexCount());
 	const std::size_t moved =
 	    ApplyTexCoords(io_rFrom, i_pSeams, bTell ? i_rNode.GetName() : nullptr, io_rMesh.m_Vertices, indices);
-	m_Moved += bTell ? moved : 0;
+	if (bTell)
+		FindGeometric(i_rNode, i_rPlace, io_rMesh);
 	if (bTell && io_rFrom.GetElementMaterialCount() == 0)
 		NVX_LOG("FBXIO", NVX::ELogWarning, "Missing material for mesh %1%", io_rFrom.GetName());
-	if (io_rMesh.m_Vertices.size() < c_FirstLargeCount)
-		SplitIntoParts<std::uint16_t>(io_rFrom, indices, io_rMesh.m_Parts);
-	else
-		SplitIntoParts<std::uint32_t>(io_rFrom, indices, io_rMesh.m_Parts);
+	const std::size_t withoutPart = io_rMesh.m_Vertices.size() < c_FirstLargeCount
+	    ? SplitIntoParts<std::uint16_t>(io_rFrom, indices, io_rMesh.m_Parts)
+	    : SplitIntoParts<std::uint32_t>(io_rFrom, indices, io_rMesh.m_Parts);
+	m_Findings.m_Moved += bTell ? moved : 0;
+	m_Findings.m_WithoutPart += bTell ? withoutPart : 0;
 }
 
 const FBXIO::VMeshPart& FBXIO::FBXMeshReader::PartOf(FbxSurfaceMaterial* i_pMaterial)
@@ -159,16 +214,26 @@ void FBXIO::FBXMeshReader::ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPa
 		io_rPart.m_Shininess = Finite(pPhong->Shininess.Get());
 		io_rPart.m_Reflection = ColourAndFactor(pPhong->Reflection, pPhong->ReflectionFactor);
 	}
-	const auto* const pLambert = FbxCast<FbxSurfaceLambert>(i_pMaterial);
-	if (!pLambert)
+	const FbxPropertyT<FbxDouble3>* pColour = nullptr;
+	if (const auto* const pLambert = FbxCast<FbxSurfaceLambert>(i_pMaterial))
+	{
+		io_rPart.m_Emissive = ColourAndFactor(pLambert->Emissive, pLambert->EmissiveFactor);
+		io_rPart.m_Ambient = ColourAndFactor(pLambert->Ambient, pLambert->AmbientFactor);
+		io_rPart.m_Diffuse = ColourAndFactor(pLambert->Diffuse, pLambert->DiffuseFactor);
+		io_rPart.m_Transparent = ColourAndFactor(pLambert->TransparentColor, pLambert->TransparencyFactor);
+		pColour = &pLambert->Diffuse;
+	}
+	else if (i_pMaterial)
+	{
+		++m_Findings.m_OtherMaterials;
+		pColour = m_Rules.m_bBaseColours ? BaseColourOf(*i_pMaterial) : nullptr;
+		m_Findings.m_BaseColours += pColour ? 1 : 0;
+		if (pColour)
+			io_rPart.m_Diffuse = ColourAndFactor(*pColour, FbxPropertyT<FbxDouble>(1.0));
+	}
+	if (!pColour || pColour->GetSrcObjectCount<FbxFileTexture>() == 0)
 		return;
-	io_rPart.m_Emissive = ColourAndFactor(pLambert->Emissive, pLambert->EmissiveFactor);
-	io_rPart.m_Ambient = ColourAndFactor(pLambert->Ambient, pLambert->AmbientFactor);
-	io_rPart.m_Diffuse = ColourAndFactor(pLambert->Diffuse, pLambert->DiffuseFactor);
-	io_rPart.m_Transparent = ColourAndFactor(pLambert->TransparentColor, pLambert->TransparencyFactor);
-	if (pLambert->Diffuse.GetSrcObjectCount<FbxFileTexture>() == 0)
-		return;
-	const FbxFileTexture& rTexture = *pLambert->Diffuse.GetSrcObject<FbxFileTexture>(0);
+	const FbxFileTexture& rTexture = *pColour->GetSrcObject<FbxFileTexture>(0);
 	io_rPart.m_TexturePath = rTexture.GetFileName();
 	VCachedPicture picture =
 	    m_Images.Get(io_rPart.m_TexturePath + " (embedded)", [&rTexture] { return ContentOf(rTexture); });
@@ -205,7 +270,7 @@ bool FBXIO::FBXMeshReader::ReadMesh(FbxNode& i_rNode, VBasicMesh& o_rMesh)
 	if (!pMesh || !TakeMesh(i_rNode, *pMesh, sizeof(VBasicVertex), 0, seams))
 		return false;
 	Prepare(i_rNode, *pMesh, o_rMesh);
-	Finish(i_rNode, *pMesh, seams ? &*seams : nullptr, o_rMesh);
+	Finish(i_rNode, *pMesh, i_rNode.EvaluateGlobalTransform(), seams ? &*seams : nullptr, o_rMesh);
 	return true;
 }
 
@@ -246,12 +311,7 @@ bool FBXIO::FBXMeshReader::TakeMesh(FbxNode& i_rNode, FbxMesh& io_rFrom, std::si
 
 void FBXIO::FBXMeshReader::EndMeshes()
 {
-	if (m_Moved > 0)
-		NVX_LOG("FBXIO", NVX::ELogInformation,
-		    "%1% polygon vertices of %2% are moved in all: its meshes are not drawn as the file means them. Told apart "
-		    "by control point, too, the vertices stay",
-		    m_Moved, m_Path);
-	m_Moved = 0;
+	Tell(std::exchange(m_Findings, {}), m_Path);
 }
 
 std::int64_t FBXIO::FBXMeshReader::FindBone(FbxCluster& i_rCluster)
@@ -313,8 +373,11 @@ std::int64_t FBXIO::FBXMeshReader::BindBone(FbxCluster& i_rCluster)
 		pMatrix->SetT(translation);
 	}
 	VSkinBone& rBone = (*m_pSkeleton)[bone];
-	rBone.m_InverseBind = SystemMatrix(link.Inverse() * transform);
-	CheckTransform(rBone.m_InverseBind, rBone.m_Name, m_Searched.insert(&i_rCluster).second);
+	QMatrix4x4 inverseBind = SystemMatrix(link.Inverse() * transform);
+	CheckTransform(inverseBind, rBone.m_Name, m_Searched.insert(&i_rCluster).second);
+	if (!m_BoundBones.insert(bone).second && AreSeenToDiffer(inverseBind, rBone.m_InverseBind))
+		m_Findings.m_BoundDifferently.insert(bone);
+	rBone.m_InverseBind = inverseBind;
 	return bone;
 }
 
@@ -349,5 +412,8 @@ void FBXIO::FBXMeshReader::ReadSkinMesh(FbxNode& i_rNode, std::vector<VSkinMesh>
 		rMesh.m_Vertices[point].m_BoneWeights = read.m_Points[point].m_Weights;
 	}
 	TellSkinWeights(read, i_rNode.GetName());
-	Finish(i_rNode, *pMesh, seams ? &*seams : nullptr, rMesh);
+	FbxAMatrix place = i_rNode.EvaluateGlobalTransform();
+	if (!clusters.empty())
+		clusters.front().first->GetTransformMatrix(place);
+	Finish(i_rNode, *pMesh, place, seams ? &*seams : nullptr, rMesh);
 }

@@ -3,6 +3,7 @@
 #include "FBXIO/ImageCache.h"
 #include "FBXIO/Limits.h"
 #include "FBXIO/Mesh.h"
+#include "FBXIO/MeshFindings.h"
 #include "FBXIO/MeshRules.h"
 #include "FBXIO/Seams.h"
 
@@ -28,11 +29,7 @@ public:
 	/// The skeleton whose bones clusters are found in; the last bone of each name.
 	void SetSkeleton(std::shared_ptr<VSkinSkeleton> i_pSkeleton);
 
-	void SetRules(const VMeshRules& i_rRules)
-	{
-		m_Rules = i_rRules;
-		m_Images.SetPictures(i_rRules.m_Pictures);
-	}
+	void SetRules(const VMeshRules& i_rRules);
 
 	static bool IsMesh(FbxNode& i_rNode);
 
@@ -60,8 +57,13 @@ public:
 private:
 	template <typename TVertex>
 	void Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TVertex>& o_rMesh);
+	/// @param i_rPlace where the mesh stands in the scene
 	template <typename TVertex>
-	void Finish(FbxNode& i_rNode, FbxMesh& io_rFrom, VSeams* i_pSeams, VMesh<TVertex>& io_rMesh);
+	void Finish(
+	    FbxNode& i_rNode, FbxMesh& io_rFrom, const FbxAMatrix& i_rPlace, VSeams* i_pSeams, VMesh<TVertex>& io_rMesh);
+	/// How far a mesh would be moved that is drawn without its geometric transform.
+	template <typename TVertex>
+	void FindGeometric(FbxNode& i_rNode, const FbxAMatrix& i_rPlace, const VMesh<TVertex>& i_rMesh);
 	/// False, and told, if the meshes are beyond the limit with so much more.
 	bool Take(FbxNode& i_rNode, std::uint64_t i_Bytes);
 	/// For a whole mesh with what it needs beyond vertices. Finds its seams, whose vertices are part of it.
@@ -85,8 +87,9 @@ private:
 	float m_UnitScale = 1.0f;
 	std::uint64_t m_BytesLeft = 0;
 	VMeshRules m_Rules;
-	/// Polygon vertices that were moved, and were told mesh by mesh.
-	std::size_t m_Moved = 0;
+	VMeshFindings m_Findings;
+	/// Of the skeleton.
+	std::set<std::int64_t> m_BoundBones;
 	/// Nodes whose meshes' findings have been told.
 	std::set<const FbxNode*> m_Told;
 	/// Skins whose bones have been looked for, and clusters of which it was told that theirs is missing or damaged.

@@ -25,10 +25,13 @@ enum class EPictures
 struct VMeshRules
 {
 	EVertexKey m_VertexKey = EVertexKey::UVIndex;
+	/// A material that is neither Phong nor Lambert shows its base colour and the texture of that, under the names that
+	/// exporters give them; else it is drawn in the default.
+	bool m_bBaseColours = false;
 	EPictures m_Pictures = EPictures::All;
 };
 
 /// For programs that show a mesh as its file means it.
-inline constexpr VMeshRules c_FaithfulMeshes{EVertexKey::ControlPointAndUVIndex};
+inline constexpr VMeshRules c_FaithfulMeshes{EVertexKey::ControlPointAndUVIndex, true};
 
 } // namespace FBXIO

@@ -83,14 +83,17 @@ std::size_t ApplyTexCoords(FbxMesh& io_rFrom, VSeams* i_pSeams, const char* i_pN
 }
 
 /// Cuts polygons into fans of triangles, each for the part of its material.
+/// @return how many polygons are left out because there is no part for them
 template <typename TIndex>
-void SplitIntoParts(FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndices, std::vector<VMeshPart>& io_rParts)
+std::size_t SplitIntoParts(
+    FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndices, std::vector<VMeshPart>& io_rParts)
 {
 	const int count = io_rFrom.GetPolygonCount();
 	const bool bMaterial = io_rFrom.GetElementMaterialCount() > 0;
 	const FbxLayerElementArrayTemplate<int>* const pList =
 	    bMaterial ? &io_rFrom.GetElementMaterial()->GetIndexArray() : nullptr;
 	const bool bList = pList && pList->GetCount() == count;
+	std::size_t withoutPart = 0;
 	/// Calls i_Visit(part, vertices, size) for each polygon that makes triangles.
 	const auto forEachPolygon = [&](auto&& i_Visit)
 	{
@@ -98,12 +101,17 @@ void SplitIntoParts(FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndi
 		{
 			const std::size_t part = bList ? std::size_t(std::max(pList->GetAt(polygon), 0)) : 0;
 			const int size = io_rFrom.GetPolygonSize(polygon);
-			if (part < io_rParts.size() && size >= 3)
+			if (size < 3)
+				continue;
+			if (part < io_rParts.size())
 				i_Visit(part, i_rIndices.data() + io_rFrom.GetPolygonVertexIndex(polygon), size);
+			else
+				++withoutPart;
 		}
 	};
 	std::vector<std::size_t> triangles(io_rParts.size());
 	forEachPolygon([&](std::size_t i_Part, const std::uint32_t*, int i_Size) { triangles[i_Part] += i_Size - 2; });
+	const std::size_t leftOut = withoutPart;
 	std::vector<std::uint8_t*> next(io_rParts.size());
 	for (std::size_t i = 0; i < io_rParts.size(); ++i)
 	{
@@ -126,6 +134,7 @@ void SplitIntoParts(FbxMesh& io_rFrom, const std::vector<std::uint32_t>& i_rIndi
 			    triangle[2] = TIndex(i_pVertices[i]);
 		    }
 	    });
+	return leftOut;
 }
 
 } // namespace FBXIO

@@ -44,6 +44,23 @@ constexpr VEntry<FbxSurfacePhong, VNumber> c_PhongNumbers[]{
     {"ReflectionFactor", "Reflectivity", &FbxSurfacePhong::ReflectionFactor},
 };
 
+/// The color of a material that is neither, and its texture, the best first: without what stands before the last "|",
+/// which tells the exporter and the group, without underscores, in small letters.
+constexpr std::string_view c_BaseColors[]{"basecolor", "diffusecolor", "diffuse"};
+constexpr std::string_view c_BaseColorTextures[]{
+    "basecolormap", "basecolortexture", "basecolor", "texcolormap", "diffusecolor", "diffuse"};
+
+template <std::size_t t_Count>
+std::size_t PlaceOf(const std::string_view (&i_rNames)[t_Count], std::string_view i_Property)
+{
+	i_Property.remove_prefix(i_Property.rfind('|') + 1);
+	std::string plain;
+	for (const char character : i_Property.substr(0, 64))
+		if (character != '_')
+			plain += character >= 'A' && character <= 'Z' ? char(character + 32) : character;
+	return std::size_t(std::find(std::begin(i_rNames), std::end(i_rNames), plain) - std::begin(i_rNames));
+}
+
 /// Calls i_Visit(entry, material of the entry's class) for each property that the material has.
 template <typename TVisit>
 void ForEachProperty(FbxSurfaceLambert& io_rMaterial, TVisit&& i_Visit)
@@ -115,12 +132,33 @@ std::unique_ptr<fbxsdk::FbxSurfaceMaterial> FbxFormat::VMaterialReader::ReadMate
 	else if (EqualInAnyCase(model, "lambert"))
 		pMaterial.reset(new FbxSurfaceLambert(std::move(name)));
 	else
-		return std::unique_ptr<FbxSurfaceMaterial>(new FbxSurfaceMaterial(std::move(name)));
+	{
+		std::unique_ptr<FbxSurfaceMaterial> pOther(new FbxSurfaceMaterial(std::move(name)));
+		ReadBaseColor(i_rObject.m_Element, *pOther);
+		return pOther;
+	}
 	ForEachProperty(*pMaterial,
 	    [this](const auto& i_rEntry, auto& io_rOf)
 	    { (io_rOf.*i_rEntry.m_pMember).m_Value = (*m_pDefaults.*i_rEntry.m_pMember).m_Value; });
 	ReadValues(i_rObject.m_Element, *pMaterial);
 	return pMaterial;
+}
+
+void FbxFormat::VMaterialReader::ReadBaseColor(
+    VElementIndex i_Properties, fbxsdk::FbxSurfaceMaterial& io_rMaterial) const
+{
+	std::size_t best = std::size(c_BaseColors);
+	VisitProperties(m_rDocument.Tree(), i_Properties,
+	    [&](std::string_view i_Name, VValueCursor& io_rCursor)
+	    {
+		    const std::size_t place = PlaceOf(c_BaseColors, i_Name);
+		    if (place >= best)
+			    return;
+		    best = place;
+		    FbxDouble3 color(1.0, 1.0, 1.0);
+		    ReadNext(io_rCursor, color);
+		    io_rMaterial.m_pBaseColor = std::make_unique<VColor>(color);
+	    });
 }
 
 void FbxFormat::VMaterialReader::ReadValues(VElementIndex i_Properties, FbxSurfaceLambert& io_rMaterial) const
@@ -156,7 +194,15 @@ void FbxFormat::VMaterialReader::Connect(
 {
 	auto* const pMaterial = FbxCast<FbxSurfaceLambert>(&io_rMaterial);
 	if (!pMaterial)
+	{
+		if (PlaceOf(c_BaseColorTextures, i_Property) == std::size(c_BaseColorTextures))
+			return;
+		// It takes the place of the color.
+		if (!io_rMaterial.m_pBaseColor || io_rMaterial.m_pBaseColor->m_Sources.empty())
+			io_rMaterial.m_pBaseColor = std::make_unique<VColor>(FbxDouble3(1.0, 1.0, 1.0));
+		io_rMaterial.m_pBaseColor->m_Sources.push_back(&i_rTexture);
 		return;
+	}
 	ForEachProperty(*pMaterial,
 	    [&](const auto& i_rEntry, auto& io_rOf)
 	    {

@@ -24,6 +24,7 @@ public:
 
 private:
 	std::string_view ShadingModel(const VObject& i_rObject) const;
+	void ReadBaseColor(VElementIndex i_Properties, fbxsdk::FbxSurfaceMaterial& io_rMaterial) const;
 	void ReadValues(VElementIndex i_Properties, fbxsdk::FbxSurfaceLambert& io_rMaterial) const;
 
 	const VDocument& m_rDocument;

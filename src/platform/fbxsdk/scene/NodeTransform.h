@@ -15,7 +15,7 @@ enum class EInheritType
 	Rrs
 };
 
-/// The properties that place a node, in file units and degrees. Those of the geometry alone are not among them.
+/// The properties that place a node, in file units and degrees.
 struct VNodeTransform
 {
 	Rotation::VVector3 m_Translation{};
@@ -27,6 +27,10 @@ struct VNodeTransform
 	Rotation::VVector3 m_ScalingPivot{};
 	Rotation::VVector3 m_PreRotation{};
 	Rotation::VVector3 m_PostRotation{};
+	/// Of what the node is, and not of what is below it: in no transform of a node.
+	Rotation::VVector3 m_GeometricTranslation{};
+	Rotation::VVector3 m_GeometricRotation{};
+	Rotation::VVector3 m_GeometricScaling{1, 1, 1};
 	ERotationOrder m_Order = ERotationOrder::XYZ;
 	EInheritType m_InheritType = EInheritType::RrSs;
 	bool m_bRotationActive = false;

@@ -33,6 +33,9 @@ constexpr std::pair<std::string_view, Rotation::VVector3 VNodeTransform::*> c_Ve
     {"ScalingPivot", &VNodeTransform::m_ScalingPivot},
     {"PreRotation", &VNodeTransform::m_PreRotation},
     {"PostRotation", &VNodeTransform::m_PostRotation},
+    {"GeometricTranslation", &VNodeTransform::m_GeometricTranslation},
+    {"GeometricRotation", &VNodeTransform::m_GeometricRotation},
+    {"GeometricScaling", &VNodeTransform::m_GeometricScaling},
 };
 
 /// A number that no enumerator has leaves the default; "spheric" order, 6, turns as XYZ does.

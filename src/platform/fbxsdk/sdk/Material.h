@@ -4,6 +4,8 @@
 #include "fbxsdk/sdk/AffineMatrix.h"
 #include "fbxsdk/sdk/Property.h"
 
+#include <memory>
+
 namespace FbxFormat
 {
 class VSceneBuilder;
@@ -15,9 +17,17 @@ namespace fbxsdk
 /// A material of whichever shading model; those that are known are of the classes below.
 class FbxSurfaceMaterial : public FbxObject
 {
+public:
+	/// Of one that is of none of these classes, under the names that exporters give it, with its textures as sources;
+	/// white if they alone are there. Null if the file names none. The SDK finds such a property by its name alone.
+	const FbxPropertyT<FbxDouble3>* GetBaseColor() const { return m_pBaseColor.get(); }
+
 protected:
 	friend class FbxFormat::VMaterialReader;
 	using FbxObject::FbxObject;
+
+private:
+	std::unique_ptr<FbxPropertyT<FbxDouble3>> m_pBaseColor;
 };
 
 /// Values start as the SDK has them for a file that does not tell.

@@ -84,6 +84,24 @@ fbxsdk::FbxVector4 fbxsdk::FbxNode::GetPreRotation(EPivotSet pPivotSet) const
 	return {x, y, z};
 }
 
+fbxsdk::FbxVector4 fbxsdk::FbxNode::GetGeometricTranslation(EPivotSet pPivotSet) const
+{
+	const auto& [x, y, z] = m_pData->m_Properties.m_GeometricTranslation;
+	return pPivotSet == eSourcePivot ? FbxVector4(x, y, z) : FbxVector4();
+}
+
+fbxsdk::FbxVector4 fbxsdk::FbxNode::GetGeometricRotation(EPivotSet pPivotSet) const
+{
+	const auto& [x, y, z] = m_pData->m_Properties.m_GeometricRotation;
+	return pPivotSet == eSourcePivot ? FbxVector4(x, y, z) : FbxVector4();
+}
+
+fbxsdk::FbxVector4 fbxsdk::FbxNode::GetGeometricScaling(EPivotSet pPivotSet) const
+{
+	const auto& [x, y, z] = m_pData->m_Properties.m_GeometricScaling;
+	return pPivotSet == eSourcePivot ? FbxVector4(x, y, z) : FbxVector4(1.0, 1.0, 1.0);
+}
+
 void fbxsdk::FbxNode::VData::Evaluate(const VData* i_pParent)
 {
 	const FbxFormat::VLocalTransform local = FbxFormat::LocalTransform(m_Properties);

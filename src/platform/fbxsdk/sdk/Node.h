@@ -99,6 +99,11 @@ public:
 	/// In degrees, order XYZ; zero where the node's flags turn it off. Files have no destination pivots.
 	FbxVector4 GetPreRotation(EPivotSet pPivotSet) const;
 
+	/// Between the node and its mesh, in file units and degrees; no part of any transform that is evaluated.
+	FbxVector4 GetGeometricTranslation(EPivotSet pPivotSet) const;
+	FbxVector4 GetGeometricRotation(EPivotSet pPivotSet) const;
+	FbxVector4 GetGeometricScaling(EPivotSet pPivotSet) const;
+
 	/// Relative to the parent, in file units.
 	FbxAMatrix& EvaluateLocalTransform(FbxTime pTime = FBXSDK_TIME_INFINITE, EPivotSet pPivotSet = eSourcePivot,
 	    bool pApplyTarget = false, bool pForceEval = false);
