@@ -314,6 +314,9 @@ const VHostileRow c_Rows[]{
 	        return Write(c_Forms[1], records);
         },
         {true, 2, 1, 1, "Unit of nan centimetres is none; taking centimetres"}},
+    {"PointsOfWordsThatAreNoNumbers",
+        [] { return With("Vertices", VRaw{"*12 {\n a: 0,0,nan(ind),1,-nan,0,0,1,inf,0,1,-inf\n}"}, c_SmallFiles[4]); },
+        {true, 2, 1, 1, "4 control points of mesh body have coordinates or normals that are no numbers"}},
     {"ObjectsWithoutANumber", [] { return WithLines("Model: {\n}\nDeformer: 1.5\n", {}); },
         {true, 2, 1, 1, "Objects left out because they have neither number nor name: 2"}},
 };

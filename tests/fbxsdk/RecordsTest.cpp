@@ -118,6 +118,9 @@ INSTANTIATE_TEST_SUITE_P(Rows, TextRecords,
         VTextRow{"OneLine", "A: { B: 1 C: 2 } D: 3", "A(){B(1) C(2)} D(3)"},
         VTextRow{"Numbers", "A: +1,-0,1e3,1.#INF,-1.#INF,0x10,9223372036854775808",
             "A(1,0,1000,1.#INF,-1.#INF,16,9.2233720368547758e+18)"},
+        VTextRow{"NotFinite",
+            "A: nan,-nan,nan(ind),-nan(ind),NaN(snan),inf,-inf,INF,infinity,1.#QNAN,-1.#IND00,nan(,nano",
+            "A(1.#IND,-1.#IND,1.#IND,-1.#IND,1.#IND,1.#INF,-1.#INF,1.#INF,1.#INF,1.#IND,1.#IND,nan(,nano)"},
         VTextRow{"Array", "A: *3 {\n a: 1,2,3\n} B: 1", "A([]) B(1)"},
         VTextRow{"EmptyArray", "A: *0 { } B: 1", "A() B(1)"},
         VTextRow{"UnclosedRecord", "A: { B: 1", "A(){B(1)}", "it ends inside a record"},
@@ -143,8 +146,8 @@ TEST(Records, LieSixtyFourDeepAtMost)
 				record = {"D", {}, {record}};
 			std::string error;
 			Read(Write(rForm, {record}), &error);
-			EXPECT_EQ(
-			    error.substr(0, error.find(" (byte ")), depth > 65 ? "its records lie more than 64 deep in one another" : "")
+			EXPECT_EQ(error.substr(0, error.find(" (byte ")),
+			    depth > 65 ? "its records lie more than 64 deep in one another" : "")
 			    << rForm.m_pName << ' ' << depth;
 		}
 }

@@ -89,7 +89,9 @@ FbxFormat::VValue FbxFormat::ParseNumber(std::string_view i_Text)
 	const std::size_t size = NumberText::ScanReal(i_Text, real);
 	if (size == i_Text.size() && size > 0)
 		return Real(real);
-	// What the C library of Windows prints for numbers that are not finite.
+	// What C libraries print for numbers that are not finite: "nan(ind)", and "1.#INF" on Windows of old.
+	if (size > 0 && std::isnan(real) && i_Text[size] == '(' && i_Text.back() == ')')
+		return Real(real);
 	if (size > 0 && i_Text[size] == '#')
 		return Real(i_Text.substr(size).starts_with("#INF") ? real * std::numeric_limits<double>::infinity()
 		                                                    : std::numeric_limits<double>::quiet_NaN());

@@ -52,7 +52,7 @@ private:
 /// The value at that place of a record, counted from 0; of kind None if there are not so many.
 VValue ValueAt(const VElementTree& i_rTree, VElementIndex i_Element, int i_Place);
 
-/// A number of the text form, "1.#INF" and its kin included; kind Word if it is none.
+/// A number of the text form, "1.#INF", "nan(ind)" and their kin included; kind Word if it is none.
 VValue ParseNumber(std::string_view i_Text);
 
 } // namespace FbxFormat
