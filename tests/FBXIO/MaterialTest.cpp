@@ -131,6 +131,12 @@ TEST_P(Material, PicturesInTheFileComeFirst)
 	EXPECT_EQ(parts[0].m_pTexture->width(), 5);
 	EXPECT_EQ(parts[0].m_TexturePath, "C:\\art\\skin.png");
 	EXPECT_TRUE(m_Failed.Take().empty());
+	// Of several videos of one file that which holds it, wherever it stands.
+	const std::string picture = Get(Path("other.png"));
+	for (const VMeshPart& rPart : Read({{"lambert", {}, "C:\\a.png", "", {}, true},
+	         {"lambert", {}, "C:\\a.png", "", picture, true}, {"lambert", {}, "C:\\a.png", "", {}}}))
+		EXPECT_EQ(rPart.m_pTexture ? rPart.m_pTexture->width() : 0, 5);
+	EXPECT_TRUE(m_Failed.Take().empty());
 	// One that is no picture: that beside the file.
 	const std::vector<VMeshPart> broken = Read({{"lambert", {}, "skin.png", "", "no picture"}});
 	ASSERT_NE(broken.at(0).m_pTexture, nullptr);
@@ -275,7 +281,8 @@ TEST_P(Material, OfAnUnknownClassMayShowItsBaseColour)
 			continue;
 		VTestLog log("FBXIO");
 		const std::vector<VMeshPart> parts =
-		    Read({{"unknown", rRow.m_Properties, *rRow.m_pTextured ? Path("skin.png") : "", "", {}, rRow.m_pTextured}},
+		    Read({{"unknown", rRow.m_Properties, *rRow.m_pTextured ? Path("skin.png") : "", "", {}, false,
+		             rRow.m_pTextured}},
 		        {"AllSame", "IndexToDirect", {}, {0}}, {}, c_FaithfulMeshes);
 		ASSERT_EQ(parts.size(), 1u);
 		EXPECT_EQ(parts[0].m_Diffuse, rRow.m_Diffuse);

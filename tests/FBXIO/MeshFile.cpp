@@ -105,8 +105,14 @@ void AddMaterials(const VTestForm& i_rForm, const VTestValue& i_rNode, VObjects&
 			    {VRaw{i_rForm.m_Form == EForm::Binary
 			            ? Bytes('R', std::uint32_t(rMaterial.m_Content.size()), rMaterial.m_Content)
 			            : '"' + text.left(8).toStdString() + "\",\n\"" + text.mid(8).toStdString() + '"'}});
-			io_rObjects.Connect(io_rObjects.Add("Video", "video" + name, "Clip", {std::move(content)}), texture);
+			io_rObjects.Connect(io_rObjects.Add("Video", "video" + name, "Clip",
+			                        {Record("Filename", {rMaterial.m_FileName}), std::move(content)}),
+			    texture);
 		}
+		if (rMaterial.m_bSecondVideo)
+			io_rObjects.Connect(io_rObjects.Add("Video", "second" + name, "Clip",
+			                        {Record("Filename", {rMaterial.m_FileName}), Record("Content", {std::string()})}),
+			    texture);
 		if (i_rForm.m_Version >= 7000)
 			io_rObjects.Connect(texture, key, rMaterial.m_Property.c_str());
 		else

@@ -24,6 +24,8 @@ struct VTestMaterial
 	std::string m_RelativeName;
 	/// Of the picture, which stands in the file.
 	std::string m_Content{};
+	/// There is a second video of that file, which has no picture.
+	bool m_bSecondVideo = false;
 	/// What the texture is connected to, since version 7.
 	std::string m_Property = "DiffuseColor";
 };

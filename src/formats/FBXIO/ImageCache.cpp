@@ -41,12 +41,12 @@ FBXIO::VCachedPicture FBXIO::ImageCache::Get(const std::string& i_rPath)
 
 FBXIO::VCachedPicture FBXIO::ImageCache::Get(const std::string& i_rName, const std::function<std::string()>& i_rRead)
 {
-	const auto [entry, bNew] = m_Images.try_emplace(i_rName);
-	if (!bNew)
-		return entry->second;
+	if (const auto found = m_Images.find(i_rName); found != m_Images.end())
+		return found->second;
 	const std::string content = i_rRead();
+	// The next of that name may have one.
 	if (content.empty() || content.size() > Limits::c_ImageBytes)
-		return entry->second;
-	return entry->second =
+		return {};
+	return m_Images[i_rName] =
 	           Read(QByteArray::fromRawData(content.data(), int(content.size())), {}, i_rName, m_BytesLeftInFile);
 }

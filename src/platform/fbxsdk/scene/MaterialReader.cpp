@@ -177,16 +177,27 @@ void FbxFormat::VMaterialReader::ReadValues(VElementIndex i_Properties, FbxSurfa
 		    });
 }
 
-std::unique_ptr<fbxsdk::FbxFileTexture> FbxFormat::VMaterialReader::ReadTexture(const VObject& i_rObject) const
+std::string FbxFormat::VMaterialReader::Text(
+    const VObject& i_rObject, std::initializer_list<std::string_view> i_Names) const
 {
 	const VElementTree& rTree = m_rDocument.Tree();
-	const auto text = [&](const char* i_pName) -> std::string
-	{
-		const VElementIndex record = rTree.Find(i_rObject.m_Element, i_pName);
-		return record == c_NoElement ? std::string() : m_rDocument.Decoded(ValueAt(rTree, record, 0).m_Text);
-	};
-	return std::unique_ptr<FbxFileTexture>(
-	    new FbxFileTexture(m_rDocument.Decoded(i_rObject.m_Name), text("FileName"), text("RelativeFilename")));
+	for (const std::string_view name : i_Names)
+		if (const VElementIndex record = rTree.Find(i_rObject.m_Element, name); record != c_NoElement)
+			return m_rDocument.Decoded(ValueAt(rTree, record, 0).m_Text);
+	return {};
+}
+
+std::unique_ptr<fbxsdk::FbxFileTexture> FbxFormat::VMaterialReader::ReadTexture(const VObject& i_rObject) const
+{
+	return std::unique_ptr<FbxFileTexture>(new FbxFileTexture(
+	    m_rDocument.Decoded(i_rObject.m_Name), Text(i_rObject, {"FileName"}), Text(i_rObject, {"RelativeFilename"})));
+}
+
+std::unique_ptr<fbxsdk::FbxVideo> FbxFormat::VMaterialReader::ReadVideo(
+    const VObject& i_rObject, const VArraySource& i_rContent) const
+{
+	return std::unique_ptr<FbxVideo>(
+	    new FbxVideo(m_rDocument.Decoded(i_rObject.m_Name), Text(i_rObject, {"Filename", "FileName"}), i_rContent));
 }
 
 void FbxFormat::VMaterialReader::Connect(

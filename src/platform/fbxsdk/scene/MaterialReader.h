@@ -3,6 +3,7 @@
 #include "fbxsdk/document/Document.h"
 #include "fbxsdk/sdk/Material.h"
 
+#include <initializer_list>
 #include <memory>
 
 namespace FbxFormat
@@ -17,6 +18,7 @@ public:
 
 	std::unique_ptr<fbxsdk::FbxSurfaceMaterial> ReadMaterial(const VObject& i_rObject) const;
 	std::unique_ptr<fbxsdk::FbxFileTexture> ReadTexture(const VObject& i_rObject) const;
+	std::unique_ptr<fbxsdk::FbxVideo> ReadVideo(const VObject& i_rObject, const VArraySource& i_rContent) const;
 
 	/// Makes the texture a source of the property of that name, if the material has it.
 	static void Connect(
@@ -24,6 +26,8 @@ public:
 
 private:
 	std::string_view ShadingModel(const VObject& i_rObject) const;
+	/// The text of the child record of the first of these names that there is.
+	std::string Text(const VObject& i_rObject, std::initializer_list<std::string_view> i_Names) const;
 	void ReadBaseColor(VElementIndex i_Properties, fbxsdk::FbxSurfaceMaterial& io_rMaterial) const;
 	void ReadValues(VElementIndex i_Properties, fbxsdk::FbxSurfaceLambert& io_rMaterial) const;
 

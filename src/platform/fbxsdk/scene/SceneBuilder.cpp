@@ -211,7 +211,7 @@ FbxFormat::VSceneBuilder::VBuilt FbxFormat::VSceneBuilder::BuildPart(
 	else if (i_rObject.m_Kind == "Texture")
 		return AddPart(i_rMaterials.ReadTexture(i_rObject).release());
 	else if (i_rObject.m_Kind == "Video")
-		return AddPart(new fbxsdk::FbxVideo(name(), record.Child("Content")));
+		return AddPart(i_rMaterials.ReadVideo(i_rObject, record.Child("Content")).release());
 	return {};
 }
 
@@ -281,6 +281,7 @@ void FbxFormat::VSceneBuilder::Connect()
 		    && seen.emplace(rConnection.m_Child, rConnection.m_Parent, rConnection.m_Property).second)
 			ConnectParts(rChild, rParent, rConnection.m_Property);
 	}
+	FindContents();
 	// In the order of the file: nodes may share materials. A mesh that nodes share has its textures in the first.
 	std::set<const fbxsdk::FbxMesh*> looked;
 	for (const auto& pNode : rContent.m_Nodes)
@@ -295,6 +296,20 @@ void FbxFormat::VSceneBuilder::Connect()
 		NVX_LOG("FBXIO", NVX::ELogWarning,
 		    "Connections left out because their node has another parent: %1%, such as that of %2%", m_SecondParents,
 		    m_pSecondParent->GetName());
+}
+
+void FbxFormat::VSceneBuilder::FindContents()
+{
+	std::map<std::string_view, const fbxsdk::FbxVideo*> videos;
+	for (const VBuilt& rBuilt : m_Built)
+		if (auto* const* const pVideo = std::get_if<fbxsdk::FbxVideo*>(&rBuilt);
+		    pVideo && (*pVideo)->m_bContent && !(*pVideo)->m_FileName.empty())
+			videos.try_emplace((*pVideo)->m_FileName, *pVideo);
+	for (const VBuilt& rBuilt : m_Built)
+		if (auto* const* const pTexture = std::get_if<fbxsdk::FbxFileTexture*>(&rBuilt);
+		    pTexture && !((*pTexture)->m_pVideo && (*pTexture)->m_pVideo->m_bContent))
+			if (const auto found = videos.find((*pTexture)->m_FileName); found != videos.end())
+				(*pTexture)->m_pVideo = found->second;
 }
 
 void FbxFormat::VSceneBuilder::ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::FbxNode& io_rParent)
@@ -359,7 +374,11 @@ void FbxFormat::VSceneBuilder::ConnectParts(
 			m_TexturesOfNodes[pNode].push_back(pTexture);
 	}
 	else if (child(c_pVideo) && parent(c_pTexture))
-		parent(c_pTexture)->m_pVideo = child(c_pVideo);
+	{
+		const FbxVideo*& rpVideo = parent(c_pTexture)->m_pVideo;
+		if (!rpVideo || child(c_pVideo)->m_bContent || !rpVideo->m_bContent)
+			rpVideo = child(c_pVideo);
+	}
 	else if (child(c_pSkin) && parent(c_pMesh))
 		AddSkin(*parent(c_pMesh), *child(c_pSkin));
 	else if (child(c_pCluster) && parent(c_pSkin))

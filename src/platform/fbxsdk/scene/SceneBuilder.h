@@ -53,6 +53,8 @@ private:
 	/// Empty, or what there is more of than is read.
 	std::string BuildObjects(std::uint32_t i_Version);
 	void Connect();
+	/// Of several videos of one file only one may hold it: textures of that file get this one.
+	void FindContents();
 	void ConnectNodes(fbxsdk::FbxNode& io_rChild, fbxsdk::FbxNode& io_rParent);
 	void TellUnreached();
 

@@ -63,3 +63,14 @@ std::string FbxFormat::ReadContent(const VArraySource& i_rContent)
 	}
 	return bytes;
 }
+
+bool FbxFormat::HasContent(const VArraySource& i_rContent)
+{
+	if (i_rContent.m_Element == c_NoElement)
+		return false;
+	VValueCursor cursor(*i_rContent.m_pTree, i_rContent.m_Element);
+	for (VValue value = cursor.Next(); value.m_Kind == EValueKind::Text; value = cursor.Next())
+		if (!value.m_Text.empty())
+			return true;
+	return false;
+}

@@ -11,4 +11,7 @@ namespace FbxFormat
 /// none, if it is damaged, or if it is beyond the budget.
 std::string ReadContent(const VArraySource& i_rContent);
 
+/// Whether there is anything in it.
+bool HasContent(const VArraySource& i_rContent);
+
 } // namespace FbxFormat

@@ -64,16 +64,24 @@ private:
 
 class FbxVideo : public FbxObject
 {
+public:
+	/// As the file has it, in UTF-8; may be empty.
+	const char* GetFileName() const { return m_FileName.c_str(); }
+
 private:
 	friend class FbxFileTexture;
+	friend class FbxFormat::VMaterialReader;
 	friend class FbxFormat::VSceneBuilder;
 
-	FbxVideo(std::string i_Name, const FbxFormat::VArraySource& i_rContent)
-	    : FbxObject(std::move(i_Name)), m_Content(i_rContent)
+	FbxVideo(std::string i_Name, std::string i_FileName, const FbxFormat::VArraySource& i_rContent)
+	    : FbxObject(std::move(i_Name)), m_FileName(std::move(i_FileName)), m_Content(i_rContent),
+	      m_bContent(FbxFormat::HasContent(i_rContent))
 	{
 	}
 
+	std::string m_FileName;
 	FbxFormat::VArraySource m_Content;
+	bool m_bContent;
 };
 
 class FbxFileTexture : public FbxObject
