@@ -69,11 +69,11 @@ private:
 };
 
 void AddLayer(std::vector<VTestRecord>& io_rGeometry, const char* i_pName, const char* i_pDirect, const char* i_pIndex,
-    const VTestLayer& i_rLayer)
+    const VTestLayer& i_rLayer, int i_Number = 0)
 {
 	if (i_rLayer.m_Mapping.empty())
 		return;
-	VTestRecord layer = Record(i_pName, {std::int32_t(0)},
+	VTestRecord layer = Record(i_pName, {std::int32_t(i_Number)},
 	    {Record("MappingInformationType", {i_rLayer.m_Mapping}),
 	        Record("ReferenceInformationType", {i_rLayer.m_Reference})});
 	if (*i_pDirect)
@@ -133,13 +133,16 @@ std::vector<VTestRecord> FbxTest::Records(
 		std::vector<VTestRecord> geometry{
 		    Record("Vertices", {rMesh.m_Points}), Record("PolygonVertexIndex", {Integers(rMesh.m_Polygons)})};
 		AddLayer(geometry, "LayerElementNormal", "Normals", "NormalsIndex", rMesh.m_Normals);
+		AddLayer(geometry, "LayerElementUV", "UV", "UVIndex", rMesh.m_SecondUV, 1);
 		AddLayer(geometry, "LayerElementUV", "UV", "UVIndex", rMesh.m_UV);
 		AddLayer(geometry, "LayerElementMaterial", "", "Materials", rMesh.m_MaterialLayer);
 		AddLayer(geometry, "LayerElementTexture", "", "TextureId", rMesh.m_TextureLayer);
+		AddLayer(geometry, "LayerElementEmissiveTextures", "", "TextureId", rMesh.m_EmissiveTextureLayer);
 		VTestRecord layer = Record("Layer", {std::int32_t(0)});
 		for (std::size_t i = 2; i < geometry.size(); ++i)
-			layer.m_Children.push_back(Record(
-			    "LayerElement", {}, {Record("Type", {geometry[i].m_Name}), Record("TypedIndex", {std::int32_t(0)})}));
+			if (geometry[i].m_Values[0] == VTestValue(std::int32_t(0)))
+				layer.m_Children.push_back(Record("LayerElement", {},
+				    {Record("Type", {geometry[i].m_Name}), Record("TypedIndex", {std::int32_t(0)})}));
 		if (!layer.m_Children.empty())
 			geometry.push_back(std::move(layer));
 		VTestValue owner = node;

@@ -59,6 +59,10 @@ struct VTestMesh
 	std::vector<VTestCluster> m_Clusters;
 	/// Before version 7: its index holds a texture for each polygon.
 	VTestLayer m_TextureLayer{};
+	/// Of the second layer, though they stand before those of the first.
+	VTestLayer m_SecondUV{};
+	/// Before version 7: as the texture layer, for emissive textures.
+	VTestLayer m_EmissiveTextureLayer{};
 };
 
 /// The records of the scene with its meshes as that version has them.

@@ -157,6 +157,14 @@ TEST_P(Mesh, TextureCoordinates)
 	}
 }
 
+TEST_P(Mesh, TextureCoordinatesAreThoseOfTheFirstLayer)
+{
+	VTestMesh from{
+	    0, c_Square, c_Quad, {}, {"ByVertice", "Direct", {0, 0.5, 1, 0.5, 1, 1, 0, 1}, {}}, c_OneMaterial, {}, {}};
+	from.m_SecondUV = {"ByVertice", "Direct", VNumbers(8, 0.25), {}};
+	EXPECT_EQ(Read(from).m_Vertices.at(1).m_TexCoord, (std::array<float, 2>{1, 0.5f}));
+}
+
 struct VPartsRow
 {
 	const char* m_pName;

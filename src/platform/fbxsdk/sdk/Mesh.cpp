@@ -1,6 +1,7 @@
 #include "fbxsdk/sdk/Mesh.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "fbxsdk/container/Values.h"
 
 #include <algorithm>
 #include <cmath>
@@ -14,6 +15,32 @@ constexpr const char* c_pMaterials = "LayerElementMaterial";
 
 } // namespace
 
+namespace
+{
+
+/// Calls i_Visit(name, number) for the elements that the first layer of a mesh has: number tells which of those of that
+/// name.
+template <typename TVisit>
+void ForEachOfFirstLayer(const FbxFormat::VArraySource& i_rMesh, TVisit&& i_Visit)
+{
+	const FbxFormat::VElementTree& rTree = *i_rMesh.m_pTree;
+	for (const FbxFormat::VElementIndex layer : rTree.Children(i_rMesh.m_Element))
+	{
+		if (rTree.Name(layer) != "Layer" || FbxFormat::ValueAt(rTree, layer, 0).AsInteger() != 0)
+			continue;
+		for (const FbxFormat::VElementIndex element : rTree.Children(layer))
+		{
+			const FbxFormat::VElementIndex type = rTree.Find(element, "Type");
+			const FbxFormat::VElementIndex number = rTree.Find(element, "TypedIndex");
+			if (type != FbxFormat::c_NoElement && number != FbxFormat::c_NoElement)
+				i_Visit(FbxFormat::ValueAt(rTree, type, 0).m_Text, FbxFormat::ValueAt(rTree, number, 0).AsInteger());
+		}
+		return;
+	}
+}
+
+} // namespace
+
 const std::vector<FbxFormat::VElementIndex>& fbxsdk::FbxGeometryBase::LayerRecords(std::string_view i_Name) const
 {
 	// Found once: a mesh may be placed many times, and have many records.
@@ -24,6 +51,22 @@ const std::vector<FbxFormat::VElementIndex>& fbxsdk::FbxGeometryBase::LayerRecor
 		for (const FbxFormat::VElementIndex child : m_Record.m_pTree->Children(m_Record.m_Element))
 			if (const auto found = m_LayerRecords.find(m_Record.m_pTree->Name(child)); found != m_LayerRecords.end())
 				found->second.push_back(child);
+		std::map<std::string_view, std::int64_t> first;
+		ForEachOfFirstLayer(m_Record,
+		    [&](std::string_view i_Type, std::int64_t i_Number)
+		    {
+			    if (m_LayerRecords.contains(i_Type))
+				    first.try_emplace(i_Type, i_Number);
+		    });
+		for (const auto& [type, number] : first)
+		{
+			std::vector<FbxFormat::VElementIndex>& rRecords = m_LayerRecords[type];
+			const auto record = std::find_if(rRecords.begin(), rRecords.end(),
+			    [&](FbxFormat::VElementIndex i_Record)
+			    { return FbxFormat::ValueAt(*m_Record.m_pTree, i_Record, 0).AsInteger(-1) == number; });
+			if (record != rRecords.end())
+				std::rotate(rRecords.begin(), record, record + 1);
+		}
 	}
 	return m_LayerRecords.find(i_Name)->second;
 }

@@ -29,7 +29,8 @@ public:
 		return {p[0], p[1], p[2]};
 	}
 
-	/// The elements of a kind in the order of the file; null if there are not so many.
+	/// The elements of a kind in the order of the file, but first that of the first layer; null if there are not so
+	/// many.
 	FbxGeometryElementNormal* GetElementNormal(int pIndex = 0);
 	FbxGeometryElementUV* GetElementUV(
 	    int pIndex = 0, FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eUnknown);
