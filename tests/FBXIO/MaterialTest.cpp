@@ -84,6 +84,32 @@ TEST_P(Material, ColoursByClass)
 	EXPECT_EQ(parts[2].m_Emissive, QVector4D());
 }
 
+/// What the SDK writes for old readers is a colour times its factor.
+TEST_P(Material, NamesForOldReadersCountAfterTheTemplate)
+{
+	if (GetParam().m_Version < 7000)
+		return;
+	VTestScene scene{{{"body", "Mesh", -1, {}}}, {}, {}, {}};
+	for (const bool bTemplate : {false, true})
+	{
+		if (bTemplate)
+			scene.m_MaterialTemplate = {{"DiffuseColor", {0.8, 0.8, 0.8}}, {"ReflectionFactor", {1}}};
+		const VNumbers points{0, 0, 0, 1, 0, 0, 0, 1, 0};
+		const VTestMaterial material{"phong",
+		    {{"Diffuse", {0.4, 0.4, 0.4}}, {"Reflectivity", {0.5}}, {"Emissive", {0, 1, 0}}, {"DiffuseFactor", {0.5}}},
+		    "", ""};
+		FBXReader reader;
+		EXPECT_TRUE(
+		    reader.LoadMemory(Write(GetParam(), scene, {{0, points, {0, 1, -3}, {}, {}, {}, {material}, {}}}), "PATH"));
+		VBasicMesh mesh;
+		reader.ReadTopMesh(mesh);
+		const VMeshPart& rPart = mesh.m_Parts.at(0);
+		EXPECT_EQ(rPart.m_Diffuse, bTemplate ? QVector4D(0.8f, 0.8f, 0.8f, 0.5f) : QVector4D(0.4f, 0.4f, 0.4f, 0.5f));
+		EXPECT_EQ(rPart.m_Reflection.w(), bTemplate ? 1.0f : 0.5f);
+		EXPECT_EQ(rPart.m_Emissive, QVector4D(0, 1, 0, 1)) << "not in the template";
+	}
+}
+
 TEST_P(Material, TexturesAreLookedForInTurn)
 {
 	WritePicture("maps/skin.png", 1);
@@ -244,6 +270,27 @@ TEST_P(Material, TexturesOfLayersGoToTheMaterialsOfTheirPolygons)
 		const std::vector<std::string> messages = log.Take();
 		ASSERT_EQ(messages.size(), rRow.m_Message.empty() ? 1u : 2u);
 		EXPECT_TRUE(rRow.m_Message.empty() || messages[1] == rRow.m_Message);
+	}
+}
+
+TEST_P(Material, TexturesOfOtherLayersAreNotDiffuse)
+{
+	if (GetParam().m_Version >= 7000)
+		return;
+	WritePicture("a.png", 1);
+	WritePicture("b.png", 2);
+	const VTestScene scene{{{"body", "Mesh", -1, {}}}, {}, {}, {}};
+	for (const auto& [emissive, width] : {std::pair<double, int>{-1, 1}, {0, 2}, {1, 1}})
+	{
+		VTestMesh from{0, {0, 0, 0, 1, 0, 0, 0, 1, 0}, {0, 1, -3}, {}, {}, {"AllSame", "IndexToDirect", {}, {0}},
+		    {{"lambert", {}, Path("a.png"), ""}, {"lambert", {}, Path("b.png"), ""}}, {}};
+		from.m_EmissiveTextureLayer = {"AllSame", "IndexToDirect", {}, {emissive}};
+		FBXReader reader;
+		EXPECT_TRUE(reader.LoadMemory(Write(GetParam(), scene, {from}), "PATH"));
+		VBasicMesh mesh;
+		reader.ReadTopMesh(mesh);
+		ASSERT_NE(mesh.m_Parts.at(0).m_pTexture, nullptr);
+		EXPECT_EQ(mesh.m_Parts[0].m_pTexture->width(), width);
 	}
 }
 

@@ -243,6 +243,10 @@ std::vector<VTestRecord> FbxTest::Records(const VTestForm& i_rForm, const VTestS
 		const VTestRecord defaults = Record(
 		    "PropertyTemplate", {std::string("FbxNode")}, {PropertyList(i_rForm.m_Version, i_rScene.m_Template)});
 		records.push_back(Record("Definitions", {}, {Record("ObjectType", {std::string("Model")}, {defaults})}));
+		if (!i_rScene.m_MaterialTemplate.empty())
+			records.back().m_Children.push_back(Record("ObjectType", {std::string("Material")},
+			    {Record("PropertyTemplate", {std::string("FbxSurfacePhong")},
+			        {PropertyList(i_rForm.m_Version, i_rScene.m_MaterialTemplate)})}));
 		records.push_back(settings);
 	}
 	else

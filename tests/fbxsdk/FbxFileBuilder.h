@@ -70,6 +70,8 @@ struct VTestScene
 	/// Further connections: child and parent by index, -1 for the scene.
 	std::vector<std::pair<int, int>> m_Connections;
 	std::int64_t m_EncryptionType = 0;
+	/// The same of materials.
+	std::vector<std::pair<std::string, VNumbers>> m_MaterialTemplate{};
 };
 
 inline VTestRecord Record(

@@ -5,6 +5,7 @@
 #include "fbxsdk/scene/MaterialReader.h"
 
 #include <algorithm>
+#include <vector>
 
 namespace
 {
@@ -32,6 +33,27 @@ VArrayNumbers<std::int32_t> PlacesOf(
 	return places;
 }
 
+/// The first texture that no layer for something else than the diffuse colour names, such as
+/// "LayerElementEmissiveTextures"; their count if there is none.
+std::size_t FirstWithoutLayer(const VArraySource& i_rMesh, std::size_t i_Textures, const char* i_pNode)
+{
+	std::vector<bool> named(i_Textures);
+	if (i_rMesh.m_Element != c_NoElement)
+		for (const VElementIndex layer : i_rMesh.m_pTree->Children(i_rMesh.m_Element))
+		{
+			const std::string_view name = i_rMesh.m_pTree->Name(layer);
+			if (!name.starts_with("LayerElement") || !name.ends_with("Textures"))
+				continue;
+			VArrayNumbers<std::int32_t> places;
+			const VArraySource source{i_rMesh.m_pTree, i_rMesh.m_pBudget, layer};
+			(void)FbxFormat::Decode({source.Child("TextureId"), i_pNode, &places});
+			for (const std::int32_t place : places)
+				if (place >= 0 && std::size_t(place) < i_Textures)
+					named[place] = true;
+		}
+	return std::size_t(std::find(named.begin(), named.end(), false) - named.begin());
+}
+
 } // namespace
 
 void FbxFormat::ConnectLegacyTextures(const VArraySource& i_rMesh, const char* i_pNode,
@@ -40,8 +62,10 @@ void FbxFormat::ConnectLegacyTextures(const VArraySource& i_rMesh, const char* i
 	const VArrayNumbers<std::int32_t> textures = PlacesOf(i_rMesh, "LayerElementTexture", "TextureId", i_pNode);
 	if (textures.empty())
 	{
-		for (fbxsdk::FbxSurfaceMaterial* const pMaterial : i_Materials)
-			VMaterialReader::Connect(*i_Textures.front(), *pMaterial, c_Diffuse);
+		const std::size_t place = FirstWithoutLayer(i_rMesh, i_Textures.size(), i_pNode);
+		if (place < i_Textures.size())
+			for (fbxsdk::FbxSurfaceMaterial* const pMaterial : i_Materials)
+				VMaterialReader::Connect(*i_Textures[place], *pMaterial, c_Diffuse);
 		return;
 	}
 	const VArrayNumbers<std::int32_t> materials = PlacesOf(i_rMesh, "LayerElementMaterial", "Materials", i_pNode);

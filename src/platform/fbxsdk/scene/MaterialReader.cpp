@@ -102,6 +102,16 @@ FbxFormat::VMaterialReader::VMaterialReader(const VDocument& i_rDocument)
       m_pDefaults(new FbxSurfacePhong(std::string()))
 {
 	ReadValues(m_Template, *m_pDefaults);
+	VisitProperties(i_rDocument.Tree(), m_Template,
+	    [this](std::string_view i_Name, const VValueCursor&)
+	    {
+		    ForEachProperty(*m_pDefaults,
+		        [&](const auto& i_rEntry, const auto&)
+		        {
+			        if (i_Name == i_rEntry.m_Name)
+				        m_InTemplate.insert(i_rEntry.m_Name);
+		        });
+	    });
 }
 
 std::string_view FbxFormat::VMaterialReader::ShadingModel(const VObject& i_rObject) const
@@ -166,12 +176,13 @@ void FbxFormat::VMaterialReader::ReadValues(VElementIndex i_Properties, FbxSurfa
 	// The other names first, so that the SDK's name wins wherever it stands.
 	for (const bool bOtherName : {true, false})
 		VisitProperties(m_rDocument.Tree(), i_Properties,
-		    [&io_rMaterial, bOtherName](std::string_view i_Name, VValueCursor& io_rCursor)
+		    [&io_rMaterial, bOtherName, this](std::string_view i_Name, VValueCursor& io_rCursor)
 		    {
 			    ForEachProperty(io_rMaterial,
 			        [&](const auto& i_rEntry, auto& io_rOf)
 			        {
-				        if (i_Name == (bOtherName ? i_rEntry.m_OtherName : i_rEntry.m_Name) && !i_Name.empty())
+				        if (i_Name == (bOtherName ? i_rEntry.m_OtherName : i_rEntry.m_Name) && !i_Name.empty()
+				            && !(bOtherName && m_InTemplate.contains(i_rEntry.m_Name)))
 					        ReadNext(io_rCursor, (io_rOf.*i_rEntry.m_pMember).m_Value);
 			        });
 		    });

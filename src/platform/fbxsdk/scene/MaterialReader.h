@@ -5,12 +5,14 @@
 
 #include <initializer_list>
 #include <memory>
+#include <set>
 
 namespace FbxFormat
 {
 
 /// Makes materials and textures of their records. Of a material's value the first of these counts that the file has:
-/// the property under the SDK's name, under the name that other exporters write, the template's value, the default.
+/// the property under the SDK's name, the template's value, the property under the name that other exporters write, the
+/// default. Those other names are also those of what the SDK writes for old readers: a color times its factor.
 class VMaterialReader
 {
 public:
@@ -35,6 +37,8 @@ private:
 	VElementIndex m_Template;
 	/// With the template's values, which are read once: they may be as many as the materials.
 	std::unique_ptr<fbxsdk::FbxSurfacePhong> m_pDefaults;
+	/// The SDK's names of what the template has.
+	std::set<std::string_view> m_InTemplate;
 };
 
 } // namespace FbxFormat
