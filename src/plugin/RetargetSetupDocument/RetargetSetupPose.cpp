@@ -47,7 +47,7 @@ void VRetargetSetup::MatchFilePose()
 		return Ignore(c_Command, Ignored::c_OwnJoints);
 	VSubjectParametrised subject = *target.m_pParametrised;
 	RetargetSetup::MatchFilePoseAndTell(subject, bones, m_TargetAxisMatrix, RootFactor(GetTargetScale()));
-	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData))
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities))
 		m_TargetAtRest = TargetValues();
 }
 
