@@ -44,19 +44,16 @@ const char* KindOf(VSubjectFinding::EElement i_Element)
 	return "";
 }
 
+/// One list for all files, as scripts know it of one.
 VJson ToJson(const std::vector<VChecked>& i_rFiles)
 {
-	VJson files = VJson::array();
+	VJson list = VJson::array();
 	for (const VChecked& rFile : i_rFiles)
-	{
-		VJson list = VJson::array();
 		for (const VSubjectFinding& rFinding : rFile.m_Findings)
-			list.push_back({{"kind", KindOf(rFinding.m_Element)}, {"index", rFinding.m_Index},
+			list.push_back({{"file", rFile.m_File}, {"kind", KindOf(rFinding.m_Element)}, {"index", rFinding.m_Index},
 			    {"name", rFinding.m_Name}, {"message", rFinding.m_Message}, {"remedy", rFinding.m_Remedy},
 			    {"tolerated", rFinding.m_bTolerated}});
-		files.push_back({{"file", rFile.m_File}, {"readable", rFile.m_bReadable}, {"findings", std::move(list)}});
-	}
-	return files;
+	return list;
 }
 
 std::string Count(std::size_t i_Count, const std::string& i_rWhat)
@@ -120,7 +117,8 @@ EExitStatus ShowFindings(const std::vector<std::string>& i_rPaths)
 	if (i_rPaths.size() > 1)
 		text += Count(files.size(), "file") + ": " + std::to_string(faulty) + " with findings, "
 		    + std::to_string(unreadable) + " unreadable\n";
-	PrintResult(ToJson(files), text);
+	if (!text.empty())
+		PrintResult(ToJson(files), text);
 	if (unreadable > 0)
 		return EBadInput;
 	return faulty > 0 ? EFindings : EFine;
@@ -136,7 +134,7 @@ VCommand AddCheckCommand(CLI::App& io_rProgram)
 	    "calls "
 	    "tolerated works all the same",
 	    {"check hero.qrr", "check *.qrr *.qrs",
-	        "check hero.qrr --json | jq -r '.[].findings[] | .kind + \" \" + .name + \": \" + .message'"});
+	        "check hero.qrr --json | jq -r '.[] | .kind + \" \" + .name + \": \" + .message'"});
 	const auto pFiles = std::make_shared<std::vector<std::string>>();
 	pApp->add_option("FILE", *pFiles, "Skeleton files (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx), any number")
 	    ->option_text("FILE...")
