@@ -21,8 +21,8 @@ constexpr double c_SamePlace = 1e-3;
 constexpr double c_SameMirror = 1e-3;
 
 /// The rotation of a segment's joint, taken in the world.
-Rotation::VMatrix3 WorldTurn(const std::vector<Rotation::VPose<double>>& i_rPoses, const VSubject& i_rSubject,
-    std::size_t i_SegmentIndex)
+Rotation::VMatrix3 WorldTurn(
+    const std::vector<Rotation::VPose<double>>& i_rPoses, const VSubject& i_rSubject, std::size_t i_SegmentIndex)
 {
 	const VSubject::VSegment& rSegment = i_rSubject.m_Segments[i_SegmentIndex];
 	Rotation::VMatrix3 frame = Rotation::RotationMatrixFromAngleAxis(rSegment.m_PreRotation);
@@ -58,10 +58,9 @@ bool AreMirrorImages(const VSubjectParametrised& i_rParametrised, const VSubject
 	if (!pFK || std::max(i_SegmentIndex, i_MirrorIndex) >= pFK->NumberOfSegments())
 		return true;
 	const std::vector<Rotation::VPose<double>> poses = SegmentPoses(*pFK);
-	const Rotation::VVector3 turn =
-	    Rotation::AngleAxisFromRotationMatrix(WorldTurn(poses, i_rSubject, i_SegmentIndex));
-	const Rotation::VVector3 mirrored = Mirrored(
-	    Rotation::CanonicalAngleAxis(turn), MirrorNormal(poses[i_SegmentIndex].t, poses[i_MirrorIndex].t));
+	const Rotation::VVector3 turn = Rotation::AngleAxisFromRotationMatrix(WorldTurn(poses, i_rSubject, i_SegmentIndex));
+	const Rotation::VVector3 mirrored =
+	    Mirrored(Rotation::CanonicalAngleAxis(turn), MirrorNormal(poses[i_SegmentIndex].t, poses[i_MirrorIndex].t));
 	return AngleBetween(Rotation::RotationMatrixFromAngleAxis(mirrored), WorldTurn(poses, i_rSubject, i_MirrorIndex))
 	    < c_SameMirror;
 }

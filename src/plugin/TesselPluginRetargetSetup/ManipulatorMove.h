@@ -25,11 +25,11 @@ void PoseSegment(CoreOrlexTypes::VSubjectParametrised::VSegment& io_rSegment, co
 
 /// Gives the segment on the other side the mirror image of a turn. The mirror plane stands across the line between the
 /// two joints; where they coincide there is none, and the rotation is turned round.
-/// @param i_rFrom what the dragged segment turned from to i_rWorld: its joint frame, so that the whole pose is mirrored,
-/// or its world matrix before the drag, so that the change is.
+/// @param i_rFrom what the dragged segment turned from to i_rWorld: its joint frame, so that the whole pose is
+/// mirrored, or its world matrix before the drag, so that the change is.
 /// @param i_rOrigin where the manipulator stood when the segment was selected.
-/// @param i_rMirrorFrom what the segment on the other side turns from: its joint frame, so that its pose is replaced, or
-/// its world matrix before the drag.
+/// @param i_rMirrorFrom what the segment on the other side turns from: its joint frame, so that its pose is replaced,
+/// or its world matrix before the drag.
 void PoseMirrorSegment(CoreOrlexTypes::VSubjectParametrised::VSegment& io_rMirrorSegment, const QMatrix4x4& i_rFrom,
     const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, const QMatrix4x4& i_rMirrorJointFrame,
     const QMatrix4x4& i_rMirrorFrom);

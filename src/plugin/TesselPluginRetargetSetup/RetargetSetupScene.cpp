@@ -206,8 +206,8 @@ bool VRetargetSetupScene::MirrorsChange(std::size_t i_SegmentIndex, std::size_t 
 	rRule.m_bTold = rRule.m_bTold && rRule.m_pAtRest == rAtRest.m_pParametrised;
 	rRule.m_pAtRest = rAtRest.m_pParametrised;
 	rRule.m_SegmentIndex = i_SegmentIndex;
-	rRule.m_bMirrorsChange = !RetargetSetup::AreMirrorImages(
-	    *rAtRest.m_pParametrised, *rAtRest.m_pSubject, i_SegmentIndex, i_MirrorIndex);
+	rRule.m_bMirrorsChange =
+	    !RetargetSetup::AreMirrorImages(*rAtRest.m_pParametrised, *rAtRest.m_pSubject, i_SegmentIndex, i_MirrorIndex);
 	if (rRule.m_bMirrorsChange && !std::exchange(rRule.m_bTold, true))
 		NVX_LOG("RetargetSetup", NVX::ELogInformation,
 		    "The joints of '%1%' and '%2%' are no mirror images of each other at rest: joint symmetry mirrors what "
@@ -232,7 +232,8 @@ void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
 		    index != CoreOrlexTypes::c_NoParent && !GetItemTransform({TargetSegment(index)}, parent))
 			return;
 	const QMatrix4x4 origin = RenderManipulator() ? RenderManipulator()->GivenTransform() : i_rMatrix;
-	RetargetSetup::MoveSegment(subject, segment, i_rMatrix, origin, m_pRetargetSetup->JointSymmetry(),
+	RetargetSetup::MoveSegment(
+	    subject, segment, i_rMatrix, origin, m_pRetargetSetup->JointSymmetry(),
 	    [&](std::size_t i_SegmentIndex)
 	    {
 		    QMatrix4x4 frame;

@@ -70,8 +70,8 @@ private:
 	void UpdateManipulator();
 	/// Tells of joints that cannot take the pose of the manipulator as it is.
 	void OnManipulatorPressed();
-	/// Whether the segment on the other side takes over the change of a pose rather than the pose: where the host's rules
-	/// want it, and the two are no mirror images of each other at rest. Told once for a character.
+	/// Whether the segment on the other side takes over the change of a pose rather than the pose: where the host's
+	/// rules want it, and the two are no mirror images of each other at rest. Told once for a character.
 	bool MirrorsChange(std::size_t i_SegmentIndex, std::size_t i_MirrorIndex);
 
 	/// The answer of MirrorsChange for one segment of one character, which a drag asks for again and again.
