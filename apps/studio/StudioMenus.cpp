@@ -25,7 +25,7 @@
 
 #include <tuple>
 
-static void InitialiseResources()
+static void InitialiseHelp()
 {
 	Q_INIT_RESOURCE(Help);
 }
@@ -150,7 +150,7 @@ void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
 
 void VStudioWindow::MakeHelpMenu()
 {
-	InitialiseResources();
+	InitialiseHelp();
 	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&Help")), "HelpMenu", tr("Help"));
 	AddAction(
 	    rMenu, "OperatorPage", tr("&Operator's Page"), QKeySequence::HelpContents, [this] { ShowOperatorPage(); });
