@@ -103,6 +103,8 @@ TEST_F(Skins, OfThreeCharactersFollowADrag)
 	} c_Rows[] = {{"own_game_zup_m_b7400", "pelvis", "upperarm_l", -17},
 	    {"kenney_medium_b7400", "Hips", "LeftArm", -27}, {"pab_arnaud_b7500", "Hips", "LeftArm", -17}};
 	VOperator& rOperator = *m_pOperator;
+	// What was dragged is not kept.
+	m_pWindow->Context().Application().m_AskToReplace = [](const std::string&) { return true; };
 	// Wide enough for arms beside the buttons.
 	m_pWindow->resize(1280, 700);
 	QImage sheet(3 * c_Width, 2 * (2 * c_Reach + 1), QImage::Format_RGB32);
