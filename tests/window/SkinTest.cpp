@@ -106,7 +106,7 @@ TEST_F(Skins, OfThreeCharactersFollowADrag)
 	// What was dragged is not kept.
 	m_pWindow->Context().Application().m_AskToReplace = [](const std::string&) { return true; };
 	// Wide enough for arms beside the buttons.
-	m_pWindow->resize(1280, 700);
+	m_pWindow->resize(1280, 780);
 	QImage sheet(3 * c_Width, 2 * (2 * c_Reach + 1), QImage::Format_RGB32);
 	QPainter painter(&sheet);
 	int column = 0;

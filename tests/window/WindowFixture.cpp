@@ -30,7 +30,7 @@ void Window::SetUp()
 	for (const char* const pKey : {"FolderSubjects", "FolderSkins", "FolderRetargets"})
 		m_pWindow->Context().Preferences().SetFolder(pKey, folder);
 	ASSERT_TRUE(m_pWindow->LoadModule(RETARGET_MODULE));
-	m_pWindow->resize(1100, 720);
+	m_pWindow->resize(1100, 750);
 	m_pWindow->show();
 	m_pWindow->activateWindow();
 	ASSERT_TRUE(QTest::qWaitForWindowActive(m_pWindow.get()));

@@ -62,8 +62,8 @@ const std::vector<FbxFormat::VElementIndex>& fbxsdk::FbxGeometryBase::LayerRecor
 		{
 			std::vector<FbxFormat::VElementIndex>& rRecords = m_LayerRecords[type];
 			const auto record = std::find_if(rRecords.begin(), rRecords.end(),
-			    [&](FbxFormat::VElementIndex i_Record)
-			    { return FbxFormat::ValueAt(*m_Record.m_pTree, i_Record, 0).AsInteger(-1) == number; });
+			    [this, wanted = number](FbxFormat::VElementIndex i_Record)
+			    { return FbxFormat::ValueAt(*m_Record.m_pTree, i_Record, 0).AsInteger(-1) == wanted; });
 			if (record != rRecords.end())
 				std::rotate(rRecords.begin(), record, record + 1);
 		}
