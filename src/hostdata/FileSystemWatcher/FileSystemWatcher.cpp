@@ -193,39 +193,39 @@ struct VFileSystemWatcher::VState
 		return concerned;
 	}
 
-	/// Brings the listed directories up to date after an event.
-	void Refresh(const VSystemEvent& i_rEvent)
+	/// Brings listed directories up to date.
+	/// @param i_Changed those to be looked at again in any case
+	void Refresh(const std::set<path>& i_rConcerned, std::set<path> i_Changed)
 	{
 		std::vector<VNews> news;
-		std::set<path> changed;
 		{
 			const std::lock_guard lock(m_Mutex);
-			const std::set<path> concerned = Concerned(i_rEvent, changed);
-			if (i_rEvent.m_bEnded)
-				Drop(i_rEvent.m_Watch);
-			for (const path& rListed : concerned)
+			for (const path& rListed : i_rConcerned)
 			{
+				const auto listed = m_Listed.find(rListed);
+				if (listed == m_Listed.end())
+					continue;
 				VNews of;
 				const int watch = Follow(rListed, of);
-				if (const int before = std::exchange(m_Listed[rListed], watch); before != watch)
+				if (std::exchange(listed->second, watch) != watch)
 				{
-					changed.insert(rListed);
+					i_Changed.insert(rListed);
 					news.push_back(std::move(of));
 				}
 			}
-			if (!concerned.empty())
+			if (!i_rConcerned.empty())
 				DropUnused();
 		}
 		for (const VNews& rNews : news)
 			TellOperator(rNews);
-		for (const path& rListed : changed)
+		for (const path& rListed : i_Changed)
 			m_Refreshed.Fire(rListed);
 	}
 
+	/// Under the lock.
 	/// @return the directories that an event is about: one, or all when the system lost changes of any.
 	std::vector<std::shared_ptr<VDirectory>> Find(const VSystemEvent& i_rEvent)
 	{
-		const std::lock_guard lock(m_Mutex);
 		std::vector<std::shared_ptr<VDirectory>> found;
 		for (const auto& [rKey, rpDirectory] : m_Directories)
 			if (rpDirectory->m_Watch == i_rEvent.m_Watch || i_rEvent.m_Watch < 0)
@@ -233,11 +233,28 @@ struct VFileSystemWatcher::VState
 		return found;
 	}
 
-	void Deliver(const VSystemEvent& i_rEvent)
+	void Handle(const VSystemEvent& i_rEvent)
+	{
+		std::vector<std::shared_ptr<VDirectory>> directories;
+		std::set<path> concerned;
+		std::set<path> lost;
+		{
+			const std::lock_guard lock(m_Mutex);
+			directories = Find(i_rEvent);
+			concerned = Concerned(i_rEvent, lost);
+			// Before it is told: who hears of the end may watch what stands at the path by then.
+			if (i_rEvent.m_bEnded)
+				Drop(i_rEvent.m_Watch);
+		}
+		Guarded([&] { Deliver(i_rEvent, directories); });
+		Guarded([&] { Refresh(concerned, std::move(lost)); });
+	}
+
+	void Deliver(const VSystemEvent& i_rEvent, const std::vector<std::shared_ptr<VDirectory>>& i_rDirectories)
 	{
 		if (i_rEvent.m_Watch < 0 && i_rEvent.m_Error.empty())
 			return;
-		for (const std::shared_ptr<VDirectory>& rpDirectory : Find(i_rEvent))
+		for (const std::shared_ptr<VDirectory>& rpDirectory : i_rDirectories)
 		{
 			if (!i_rEvent.m_Error.empty())
 			{
@@ -299,8 +316,7 @@ struct VFileSystemWatcher::VState
 			{
 				if (m_bStopped)
 					return;
-				Guarded([&] { Deliver(rEvent); });
-				Guarded([&] { Refresh(rEvent); });
+				Handle(rEvent);
 			}
 	}
 
