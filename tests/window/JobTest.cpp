@@ -70,13 +70,20 @@ TEST_F(Job, TheWholeJob)
 	// What stands in a field belongs to the target that it was typed for.
 	rOperator.ClickRow("targets", 2);
 	EXPECT_EVENTUALLY(rOperator.Property("TargetWeight", "text").toString() == "1");
-	for (const auto& [pField, pText, pReason] : {std::tuple("TargetStateExpressionX", "abc", "Give a number of mm"),
-	         {"TargetScale", "-1", "Give a number above 0"}, {"TargetWeight", "500", "Allowed: 1 to 100."}})
+	const struct
 	{
-		rOperator.Fill(pField, pText);
-		EXPECT_EVENTUALLY(rOperator.Property(QString(pField) + "Reason", "visible").toBool());
-		EXPECT_TRUE(rOperator.Property(QString(pField) + "Reason", "text").toString().contains(pReason)) << pField;
-		EXPECT_EQ(rOperator.Property(pField, "text").toString(), pText);
+		const char* m_pField;
+		const char* m_pText;
+		const char* m_pReason;
+	} refused[] = {{"TargetStateExpressionX", "abc", "Give a number of mm"},
+	    {"TargetScale", "-1", "Give a number above 0"}, {"TargetWeight", "500", "Allowed: 1 to 100."}};
+	for (const auto& rRow : refused)
+	{
+		const QString reason = QString(rRow.m_pField) + "Reason";
+		rOperator.Fill(rRow.m_pField, rRow.m_pText);
+		EXPECT_EVENTUALLY(rOperator.Property(reason, "visible").toBool());
+		EXPECT_TRUE(rOperator.Property(reason, "text").toString().contains(rRow.m_pReason)) << rRow.m_pField;
+		EXPECT_EQ(rOperator.Property(rRow.m_pField, "text").toString(), rRow.m_pText);
 	}
 	rOperator.Click("TargetScale");
 	rOperator.Key(Qt::Key_Escape);
@@ -152,14 +159,19 @@ TEST_F(Job, SelectsWithMouseAndKeys)
 		rOperator.ClickRow(rList, 5, Qt::ControlModifier);
 		EXPECT_EVENTUALLY(selected() == -1) << "two are selected";
 		const auto told = [&] { return rOperator.Property("status", "text").toString(); };
-		for (const auto& [pButton, rReason] : {std::pair("removeTarget", QString("No target is selected: select one.")),
-		         {"save", "No retarget subject was loaded or saved yet: use Save As."},
-		         {"addPositionTarget",
-		             rList == "sourceSegments" ? "2 source segments are selected: select only one."
-		                                       : "2 target segments are selected: select only one."}})
+		const struct
 		{
-			rOperator.Hover(pButton);
-			EXPECT_EVENTUALLY(told() == rReason);
+			const char* m_pButton;
+			const char* m_pReason;
+		} disabled[] = {{"removeTarget", "No target is selected: select one."},
+		    {"save", "No retarget subject was loaded or saved yet: use Save As."},
+		    {"addPositionTarget",
+		        rList == "sourceSegments" ? "2 source segments are selected: select only one."
+		                                  : "2 target segments are selected: select only one."}};
+		for (const auto& rRow : disabled)
+		{
+			rOperator.Hover(rRow.m_pButton);
+			EXPECT_EVENTUALLY(told() == rRow.m_pReason);
 		}
 		rOperator.ClickRow(rList, 3, Qt::ControlModifier);
 		EXPECT_EVENTUALLY(selected() == 5);
