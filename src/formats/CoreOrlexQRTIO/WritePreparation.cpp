@@ -10,6 +10,7 @@
 #include <boost/format.hpp>
 
 #include <algorithm>
+#include <locale>
 #include <set>
 
 namespace CoreOrlexQRTIO
@@ -50,11 +51,13 @@ bool PrepareTree(VWriting& io_rWriting, VTexts& io_rErrors)
 	if (reached != rSegments.size())
 		io_rErrors.push_back(
 		    (boost::format(
-		         "%1% segments cannot be reached from a root: their parents are missing or go round in a ring.")
+		         "%1% segments cannot be reached from a root: their parents are missing or go round in a ring.",
+		         std::locale::classic())
 		        % (rSegments.size() - reached))
 		        .str());
 	else if (depth > c_MaximumSegmentDepth)
-		io_rErrors.push_back((boost::format("A chain of %1% segments is longer than a file can hold, which is %2%.")
+		io_rErrors.push_back((boost::format("A chain of %1% segments is longer than a file can hold, which is %2%.",
+		                          std::locale::classic())
 		    % depth % c_MaximumSegmentDepth)
 		                         .str());
 	else
@@ -134,7 +137,8 @@ void PrepareT(VWriting& io_rWriting)
 		if (!rConstraints.empty())
 			io_rWriting.m_Warnings.push_back((
 			    boost::format("The %1% T-pose constraints do not fit the %2% degrees of freedom of the joints: none is "
-			                  "written.")
+			                  "written.",
+			        std::locale::classic())
 			    % rConstraints.size() % sizeOfAll)
 			                                     .str());
 		return;

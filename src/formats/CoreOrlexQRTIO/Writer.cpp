@@ -15,6 +15,8 @@
 
 #include <boost/format.hpp>
 
+#include <locale>
+
 namespace CoreOrlexQRTIO
 {
 namespace
@@ -33,8 +35,8 @@ const std::string* NameOf(VWriterNode& io_rNode, VWriting& io_rWriting, const au
 {
 	if (i_Index >= i_rElements.size())
 	{
-		io_rNode.AddError((boost::format("%1% element refers to %2% %3%, which does not exist.") % io_rNode.GetName()
-		    % i_pKind % i_Index)
+		io_rNode.AddError((boost::format("%1% element refers to %2% %3%, which does not exist.", std::locale::classic())
+		    % io_rNode.GetName() % i_pKind % i_Index)
 		                      .str());
 		return nullptr;
 	}
@@ -42,7 +44,8 @@ const std::string* NameOf(VWriterNode& io_rNode, VWriting& io_rWriting, const au
 	const auto first = i_rFirst.find(rName);
 	if (first != i_rFirst.end() && first->second != i_Index)
 		io_rWriting.m_Warnings.push_back(
-		    (boost::format("%1% element refers to %2% %3%, but a reader finds %2% %4%, which has the same name '%5%'.")
+		    (boost::format("%1% element refers to %2% %3%, but a reader finds %2% %4%, which has the same name '%5%'.",
+		         std::locale::classic())
 		        % io_rNode.GetName() % i_pKind % i_Index % first->second % rName)
 		        .str());
 	return &rName;
@@ -221,7 +224,8 @@ bool VWriter::WriteText(const VSubjectParametrised& i_rSubject, const VSubjectAp
 		if (writing.m_CountOfLostColours > 0)
 			writing.m_Warnings.push_back(
 			    (boost::format("Black with opacity 0 is no colour that a file can hold: %1% of the subject's colours "
-			                   "come back as the default one.")
+			                   "come back as the default one.",
+			         std::locale::classic())
 			        % writing.m_CountOfLostColours)
 			        .str());
 		o_rErrors = root.GetGlobalInfo()->m_Errors.GetTexts();
@@ -229,8 +233,9 @@ bool VWriter::WriteText(const VSubjectParametrised& i_rSubject, const VSubjectAp
 			o_rText = document.Print();
 		if (o_rText.size() > c_MaximumFileSize)
 		{
-			o_rErrors.push_back((
-			    boost::format("The file would be larger than the %1% bytes that are read at most.") % c_MaximumFileSize)
+			o_rErrors.push_back((boost::format("The file would be larger than the %1% bytes that are read at most.",
+			                         std::locale::classic())
+			    % c_MaximumFileSize)
 			                        .str());
 			o_rText.clear();
 		}

@@ -16,6 +16,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <locale>
 #include <numbers>
 
 namespace RetargetSetup
@@ -220,7 +221,7 @@ std::optional<VPoseDifference> DifferenceFromFile(const VSubjectParametrised& i_
 
 std::string WorstText(const VSubjectParametrised& i_rSubject, const VPoseDifference& i_rWorst)
 {
-	return (boost::format("at worst \"%1%\" by %2$.1f mm and %3$.1f degrees")
+	return (boost::format("at worst \"%1%\" by %2$.1f mm and %3$.1f degrees", std::locale::classic())
 	    % i_rSubject.m_Segments[i_rWorst.m_SegmentIndex].m_Name % i_rWorst.m_Distance
 	    % (i_rWorst.m_Angle * 180.0 / std::numbers::pi))
 	    .str();
