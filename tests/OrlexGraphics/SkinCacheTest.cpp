@@ -11,6 +11,7 @@
 #include <gtest/gtest.h>
 
 #include <fstream>
+#include <mutex>
 
 namespace
 {
@@ -86,7 +87,11 @@ protected:
 			return testing::AssertionFailure() << "no change was told";
 		return testing::AssertionSuccess();
 	}
-	std::string TakeLog() { return std::exchange(m_Log, {}); }
+	std::string TakeLog()
+	{
+		const std::lock_guard lock(m_LogMutex);
+		return std::exchange(m_Log, {});
+	}
 
 	const path m_Root = boost::filesystem::temp_directory_path() / boost::filesystem::unique_path("skins-%%%%%%%%");
 	const std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
@@ -96,9 +101,15 @@ protected:
 	std::shared_ptr<VSkin> m_pSkin;
 	int m_Changes = 0;
 	int m_LoadingChanges = 0;
+	/// The watcher's thread tells, too.
+	std::mutex m_LogMutex;
 	std::string m_Log;
 	const std::shared_ptr<void> m_pSink = NVX::GlobalLog::AddSink(
-	    [this](const NVX::VLogCategory&, int, const std::string& i_rMessage) { m_Log += i_rMessage + "\n"; });
+	    [this](const NVX::VLogCategory&, int, const std::string& i_rMessage)
+	    {
+		    const std::lock_guard lock(m_LogMutex);
+		    m_Log += i_rMessage + "\n";
+	    });
 };
 
 TEST_F(SkinCache, LoadsSkinsOfAGroupInTheBackground)
