@@ -96,12 +96,7 @@ protected:
 	const path m_Root = boost::filesystem::temp_directory_path() / boost::filesystem::unique_path("skins-%%%%%%%%");
 	const std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher = std::make_shared<InMemoryHost::VDispatcher>();
 	const std::shared_ptr<VHeldJobs> m_pJobs = std::make_shared<VHeldJobs>();
-	VHeldDelay* m_pDelay = nullptr;
-	std::shared_ptr<VSkinCache> m_pCache;
-	std::shared_ptr<VSkin> m_pSkin;
-	int m_Changes = 0;
-	int m_LoadingChanges = 0;
-	/// The watcher's thread tells, too.
+	/// The watcher's thread tells, too, until the cache has ended.
 	std::mutex m_LogMutex;
 	std::string m_Log;
 	const std::shared_ptr<void> m_pSink = NVX::GlobalLog::AddSink(
@@ -110,6 +105,11 @@ protected:
 		    const std::lock_guard lock(m_LogMutex);
 		    m_Log += i_rMessage + "\n";
 	    });
+	VHeldDelay* m_pDelay = nullptr;
+	std::shared_ptr<VSkinCache> m_pCache;
+	std::shared_ptr<VSkin> m_pSkin;
+	int m_Changes = 0;
+	int m_LoadingChanges = 0;
 };
 
 TEST_F(SkinCache, LoadsSkinsOfAGroupInTheBackground)
