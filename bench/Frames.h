@@ -2,8 +2,8 @@
 
 #include "Ratios.h"
 
-#include "OrlexGraphics/FrameRenderer.h"
-#include "OrlexGraphics/OrlexScene.h"
+#include "OrlexGraphics/frame/FrameRenderer.h"
+#include "OrlexGraphics/frame/OrlexScene.h"
 
 #include <QGuiApplication>
 #include <QOffscreenSurface>

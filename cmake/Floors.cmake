@@ -1,15 +1,20 @@
-# The floors of the house, from the ground. A library may use only libraries of lower floors, or those that stand
-# before it on its own floor when the floor is marked as ordered. The order is also the order of building.
-set(RETARGET_FLOOR_0 platform/host model/math kinematics/numerics hostdata/UtilsFileSystem hostdata/FileSystemWatcher)
-set(RETARGET_FLOOR_1 model/CoreOrlexTypes formats/UtilsRapidXml platform/fbxsdk)
-set(RETARGET_FLOOR_2 kinematics/ComputeSubjectFK formats/FBXIO)
-set(RETARGET_FLOOR_3 model/CoreOrlexTypesUtils)
-set(RETARGET_FLOOR_4 formats/CoreOrlexQRTIO hostdata/TesselDataStore hostdata/TesselParameters
-	hostdata/TesselParametersGUI hostdata/Flow2TypesUtils hostdata/InMemoryHost)
-set(RETARGET_FLOOR_5 scene/CoreGraphics scene/OrlexGraphics scene/Flow2Graphics)
-set(RETARGET_FLOOR_6 plugin/RetargetSetupDocument plugin/OrlexQtQuick plugin/TesselPluginRetargetSetup)
-set(RETARGET_ORDERED_FLOORS 0 4 5 6)
+# The floors of the house, from the ground: the wings of src/, and the libraries of each. A wing uses only wings below
+# it, a library of its own wing only those that stand before it. The order is also the order of building.
+set(RETARGET_WINGS base model kinematics toolbox formats hostdata scene plugin)
+set(RETARGET_WING_base host math numerics UtilsFileSystem FileSystemWatcher)
+set(RETARGET_WING_model CoreOrlexTypes)
+set(RETARGET_WING_kinematics ComputeSubjectFK)
+set(RETARGET_WING_toolbox CoreOrlexTypesUtils)
+set(RETARGET_WING_formats UtilsRapidXml CoreOrlexQRTIO fbxsdk FBXIO)
+set(RETARGET_WING_hostdata TesselDataStore TesselParameters TesselParametersGUI Flow2TypesUtils InMemoryHost)
+set(RETARGET_WING_scene CoreGraphics OrlexGraphics Flow2Graphics)
+set(RETARGET_WING_plugin RetargetSetupDocument OrlexQtQuick TesselPluginRetargetSetup)
 
-foreach(floor RANGE 6)
-	list(APPEND RETARGET_LIBRARY_FOLDERS ${RETARGET_FLOOR_${floor}})
+# Above them apps/: the programs may use every library, the first of these folders, and nothing of each other.
+set(RETARGET_PROGRAM_FOLDERS CommandLineText retarget studio)
+
+foreach(wing IN LISTS RETARGET_WINGS)
+	foreach(library IN LISTS RETARGET_WING_${wing})
+		list(APPEND RETARGET_LIBRARY_FOLDERS ${wing}/${library})
+	endforeach()
 endforeach()

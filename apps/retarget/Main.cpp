@@ -1,5 +1,5 @@
 #include "retarget/Program.h"
-#include "retarget/Renderer.h"
+#include "retarget/picture/Renderer.h"
 
 int main(int i_Count, char** i_ppArguments)
 {

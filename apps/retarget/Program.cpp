@@ -1,10 +1,10 @@
 #include "retarget/Program.h"
 
-#include "retarget/Commands.h"
-#include "retarget/HelpFormatter.h"
-#include "retarget/Output.h"
-#include "retarget/Parsing.h"
+#include "CommandLineText/HelpFormatter.h"
+#include "CommandLineText/Parsing.h"
 #include "retarget/Signals.h"
+#include "retarget/commands/Commands.h"
+#include "retarget/text/Output.h"
 
 #include "DebugServices/GlobalLog.h"
 

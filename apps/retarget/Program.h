@@ -1,8 +1,8 @@
 #pragma once
 
-#include "retarget/ExitStatus.h"
-#include "retarget/Messages.h"
-#include "retarget/RenderCommand.h"
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/picture/RenderCommand.h"
 
 #include <CLI/CLI.hpp>
 

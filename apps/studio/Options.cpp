@@ -1,9 +1,9 @@
 #include "studio/Options.h"
 
-#include "retarget/ExitStatus.h"
-#include "retarget/HelpFormatter.h"
-#include "retarget/Parsing.h"
-#include "studio/FileKind.h"
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/HelpFormatter.h"
+#include "CommandLineText/Parsing.h"
+#include "studio/panel/FileKind.h"
 
 #include <charconv>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "retarget/Messages.h"
+#include "CommandLineText/Messages.h"
 
 #include <QSize>
 #include <QString>

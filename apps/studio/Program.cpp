@@ -1,15 +1,15 @@
 #include "studio/Program.h"
 
+#include "CommandLineText/Display.h"
 #include "DebugServices/GlobalLog.h"
-#include "retarget/Display.h"
-#include "studio/DarkStyle.h"
-#include "studio/Module.h"
-#include "studio/OpenGLCheck.h"
 #include "studio/Options.h"
-#include "studio/QtDispatcher.h"
-#include "studio/RetargetPanel.h"
-#include "studio/Screenshot.h"
-#include "studio/StudioWindow.h"
+#include "studio/host/Module.h"
+#include "studio/host/OpenGLCheck.h"
+#include "studio/host/QtDispatcher.h"
+#include "studio/panel/RetargetPanel.h"
+#include "studio/window/DarkStyle.h"
+#include "studio/window/Screenshot.h"
+#include "studio/window/StudioWindow.h"
 
 #include <QApplication>
 #include <QFileInfo>

@@ -4,7 +4,7 @@
 
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/TextForm.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 
 #include "math/NumberText.h"
 

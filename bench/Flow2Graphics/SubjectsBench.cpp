@@ -7,8 +7,8 @@
 #include "InMemoryHost/Dispatcher.h"
 #include "InMemoryHost/Flow.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/RenderManipulator.h"
-#include "OrlexGraphics/SceneFramebufferObject.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
+#include "OrlexGraphics/manipulator/RenderManipulator.h"
 
 #include <QQmlPropertyMap>
 #include <QQuickFramebufferObject>

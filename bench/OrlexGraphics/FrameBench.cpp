@@ -4,9 +4,9 @@
 #include "Flow2Graphics/FlowScene.h"
 #include "InMemoryHost/Dispatcher.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/IRenderType.h"
-#include "OrlexGraphics/SelectionRegistry.h"
-#include "OrlexGraphics/SphereHelper.h"
+#include "OrlexGraphics/frame/IRenderType.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
+#include "OrlexGraphics/stage/SphereHelper.h"
 
 #include <cmath>
 

@@ -4,9 +4,9 @@
 #include "../Frames.h"
 
 #include "CoreGraphics/ShaderLibrary.h"
-#include "OrlexGraphics/RenderManipulator.h"
-#include "OrlexGraphics/SceneFramebufferObject.h"
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
+#include "OrlexGraphics/manipulator/RenderManipulator.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "TesselPluginRetargetSetup/RetargetSetupScene.h"
 

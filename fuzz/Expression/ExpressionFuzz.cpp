@@ -1,6 +1,6 @@
 #include "../Require.h"
 
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+#include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 
 #include "math/MathFactorySymbolicLinear.h"
 

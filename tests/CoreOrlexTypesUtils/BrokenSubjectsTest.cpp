@@ -1,15 +1,15 @@
 #include "CheckedSubject.h"
 
-#include "CoreOrlexTypesUtils/JointRange.h"
-#include "CoreOrlexTypesUtils/PruneToActive.h"
-#include "CoreOrlexTypesUtils/RestPose.h"
-#include "CoreOrlexTypesUtils/RigidBodyAttachment.h"
-#include "CoreOrlexTypesUtils/RigidBodyGuids.h"
-#include "CoreOrlexTypesUtils/RigidBodyLayout.h"
-#include "CoreOrlexTypesUtils/Scaling.h"
-#include "CoreOrlexTypesUtils/SubjectCheck.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
-#include "CoreOrlexTypesUtils/TargetPerMarker.h"
+#include "CoreOrlexTypesUtils/check/SubjectCheck.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/joints/JointRange.h"
+#include "CoreOrlexTypesUtils/joints/RestPose.h"
+#include "CoreOrlexTypesUtils/observations/PruneToActive.h"
+#include "CoreOrlexTypesUtils/observations/TargetPerMarker.h"
+#include "CoreOrlexTypesUtils/rigidbody/RigidBodyAttachment.h"
+#include "CoreOrlexTypesUtils/rigidbody/RigidBodyGuids.h"
+#include "CoreOrlexTypesUtils/rigidbody/RigidBodyLayout.h"
+#include "CoreOrlexTypesUtils/scale/Scaling.h"
 
 #include <algorithm>
 #include <random>

@@ -3,7 +3,7 @@
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/NameHash.h"
 #include "CoreOrlexTypes/SubjectApplicationData.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "ComputeSubjectFK/TargetFKInterfaces.h"

@@ -1,11 +1,11 @@
 #include "MessageLog.h"
 #include "RandomSubject.h"
 
-#include "CoreOrlexTypesUtils/RigidBody.h"
-#include "CoreOrlexTypesUtils/RigidBodyAttachment.h"
-#include "CoreOrlexTypesUtils/RigidBodyGuids.h"
-#include "CoreOrlexTypesUtils/RigidBodyLayout.h"
-#include "CoreOrlexTypesUtils/SubjectCheck.h"
+#include "CoreOrlexTypesUtils/check/SubjectCheck.h"
+#include "CoreOrlexTypesUtils/rigidbody/RigidBody.h"
+#include "CoreOrlexTypesUtils/rigidbody/RigidBodyAttachment.h"
+#include "CoreOrlexTypesUtils/rigidbody/RigidBodyGuids.h"
+#include "CoreOrlexTypesUtils/rigidbody/RigidBodyLayout.h"
 
 #include <gtest/gtest.h>
 

@@ -1,9 +1,9 @@
 #include "MessageLog.h"
 #include "RandomSubject.h"
 
-#include "CoreOrlexTypesUtils/ScaledExpression.h"
-#include "CoreOrlexTypesUtils/Scaling.h"
-#include "CoreOrlexTypesUtils/SubjectCheck.h"
+#include "CoreOrlexTypesUtils/check/SubjectCheck.h"
+#include "CoreOrlexTypesUtils/scale/ScaledExpression.h"
+#include "CoreOrlexTypesUtils/scale/Scaling.h"
 
 #include <gtest/gtest.h>
 

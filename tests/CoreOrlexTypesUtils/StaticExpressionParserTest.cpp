@@ -1,6 +1,6 @@
 #include "../Assertions.h"
 
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+#include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 
 #include <gtest/gtest.h>
 

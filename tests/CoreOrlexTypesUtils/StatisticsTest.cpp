@@ -2,9 +2,9 @@
 
 #include "ComputeSubjectFK/BallJointPrior.h"
 #include "CoreOrlexTypes/JointType.h"
-#include "CoreOrlexTypesUtils/EulerToAngleAxis.h"
-#include "CoreOrlexTypesUtils/JointRange.h"
-#include "CoreOrlexTypesUtils/RestPose.h"
+#include "CoreOrlexTypesUtils/joints/EulerToAngleAxis.h"
+#include "CoreOrlexTypesUtils/joints/JointRange.h"
+#include "CoreOrlexTypesUtils/joints/RestPose.h"
 
 #include <gtest/gtest.h>
 

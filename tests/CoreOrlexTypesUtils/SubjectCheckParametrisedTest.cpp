@@ -1,6 +1,6 @@
 #include "CheckedSubject.h"
 
-#include "CoreOrlexTypesUtils/SubjectCheck.h"
+#include "CoreOrlexTypesUtils/check/SubjectCheck.h"
 
 namespace Parametrised
 {

@@ -1,8 +1,8 @@
 #include "../Assertions.h"
 
-#include "CoreOrlexTypesUtils/AxisOrientation.h"
-#include "CoreOrlexTypesUtils/PoseVector.h"
-#include "CoreOrlexTypesUtils/UnusedObservations.h"
+#include "CoreOrlexTypesUtils/joints/PoseVector.h"
+#include "CoreOrlexTypesUtils/observations/UnusedObservations.h"
+#include "CoreOrlexTypesUtils/rigidbody/AxisOrientation.h"
 
 #include <gtest/gtest.h>
 

@@ -2,7 +2,7 @@
 #include "MessageLog.h"
 
 #include "CoreOrlexTypes/JointType.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 
 #include <gtest/gtest.h>
 

@@ -1,10 +1,10 @@
 #include "MessageLog.h"
 #include "RandomSubject.h"
 
-#include "CoreOrlexTypesUtils/JointParameters.h"
-#include "CoreOrlexTypesUtils/PruneToActive.h"
-#include "CoreOrlexTypesUtils/SubjectCheck.h"
-#include "CoreOrlexTypesUtils/TargetPerMarker.h"
+#include "CoreOrlexTypesUtils/check/SubjectCheck.h"
+#include "CoreOrlexTypesUtils/joints/JointParameters.h"
+#include "CoreOrlexTypesUtils/observations/PruneToActive.h"
+#include "CoreOrlexTypesUtils/observations/TargetPerMarker.h"
 
 #include <gtest/gtest.h>
 

@@ -6,7 +6,7 @@
 #include "TestSubject.h"
 
 #include "Flow2Graphics/FlowScene.h"
-#include "OrlexGraphics/SceneOptionsMap.h"
+#include "OrlexGraphics/item/SceneOptionsMap.h"
 
 #include <QImage>
 #include <QQmlPropertyMap>

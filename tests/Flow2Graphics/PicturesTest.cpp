@@ -2,12 +2,12 @@
 
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexTypes/SubjectState.h"
-#include "CoreOrlexTypesUtils/PoseVector.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/joints/PoseVector.h"
 #include "Flow2Graphics/SubjectTypes.h"
 #include "Flow2TypesUtils/ItemCatalogue.h"
-#include "OrlexGraphics/RenderManipulator.h"
-#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/manipulator/RenderManipulator.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
 #include "TestSubject.h"
 
 #include <QQuaternion>

@@ -1,7 +1,7 @@
 #include "../UtilsFileSystem/Log.h"
 #include "Flow2Graphics/FlowRenderSubjectList.h"
 #include "Flow2Graphics/SubjectShapes.h"
-#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
 #include "TestSubject.h"
 
 #include <gtest/gtest.h>

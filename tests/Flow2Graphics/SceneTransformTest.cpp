@@ -2,7 +2,7 @@
 #include "Flow2Graphics/FlowRenderSubjects.h"
 #include "Flow2Graphics/FlowSubjectSceneTransform.h"
 #include "Flow2TypesUtils/ParameterSet.h"
-#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
 #include "TestSubject.h"
 
 #include <gtest/gtest.h>

@@ -5,10 +5,10 @@
 #include "CoreGraphics/RenderContext.h"
 #include "DebugServices/GlobalLog.h"
 #include "Flow2Graphics/SubjectTypes.h"
-#include "OrlexGraphics/IRenderType.h"
-#include "OrlexGraphics/SelectionRegistry.h"
-#include "OrlexGraphics/SkinCache.h"
-#include "OrlexGraphics/SkinRenderer.h"
+#include "OrlexGraphics/frame/IRenderType.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
+#include "OrlexGraphics/skins/SkinCache.h"
+#include "OrlexGraphics/skins/SkinRenderer.h"
 #include "TestSubject.h"
 
 #include <QTemporaryDir>

@@ -3,11 +3,11 @@
 #include "Flow2Graphics/FlowRenderReconstructionVolume.h"
 #include "Flow2TypesUtils/ParameterSet.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/RenderFloorGrid.h"
-#include "OrlexGraphics/RenderReconstructionVolume.h"
-#include "OrlexGraphics/RenderVolumeManipulator.h"
-#include "OrlexGraphics/SceneOptions.h"
-#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/frame/SceneOptions.h"
+#include "OrlexGraphics/manipulator/RenderVolumeManipulator.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
+#include "OrlexGraphics/stage/RenderFloorGrid.h"
+#include "OrlexGraphics/stage/RenderReconstructionVolume.h"
 #include "TestSubject.h"
 
 #include <gtest/gtest.h>

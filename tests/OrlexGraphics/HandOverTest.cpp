@@ -1,6 +1,6 @@
 #include "../CoreGraphics/OffscreenContext.h"
-#include "OrlexGraphics/FrameRenderer.h"
-#include "OrlexGraphics/RenderManipulator.h"
+#include "OrlexGraphics/frame/FrameRenderer.h"
+#include "OrlexGraphics/manipulator/RenderManipulator.h"
 #include "ViewFixture.h"
 
 #include <QOpenGLFramebufferObject>

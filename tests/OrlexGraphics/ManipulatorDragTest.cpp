@@ -1,4 +1,4 @@
-#include "OrlexGraphics/ManipulatorDrag.h"
+#include "OrlexGraphics/manipulator/ManipulatorDrag.h"
 
 #include "../CoreGraphics/CameraChecks.h"
 

@@ -1,6 +1,6 @@
 #include "CoreGraphics/RenderContext.h"
-#include "OrlexGraphics/FrameRenderer.h"
-#include "OrlexGraphics/SphereHelper.h"
+#include "OrlexGraphics/frame/FrameRenderer.h"
+#include "OrlexGraphics/stage/SphereHelper.h"
 #include "SceneFixture.h"
 #include "ViewFixture.h"
 

@@ -1,4 +1,4 @@
-#include "OrlexGraphics/OverlayPlacement.h"
+#include "OrlexGraphics/overlays/OverlayPlacement.h"
 
 #include <gtest/gtest.h>
 

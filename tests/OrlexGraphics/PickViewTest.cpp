@@ -1,5 +1,5 @@
 #include "InMemoryHost/PreferenceFolders.h"
-#include "OrlexGraphics/TesselInteractionMapper.h"
+#include "OrlexGraphics/item/TesselInteractionMapper.h"
 #include "ViewFixture.h"
 
 #include <QSignalSpy>

@@ -1,4 +1,4 @@
-#include "OrlexGraphics/Picking.h"
+#include "OrlexGraphics/picking/Picking.h"
 
 #include <gtest/gtest.h>
 

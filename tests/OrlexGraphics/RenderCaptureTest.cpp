@@ -1,12 +1,12 @@
 #include "RenderTypeFixture.h"
 
-#include "OrlexGraphics/CameraGrid.h"
-#include "OrlexGraphics/RenderCameras.h"
-#include "OrlexGraphics/RenderForcePlates.h"
-#include "OrlexGraphics/RenderReconstructionVolume.h"
-#include "OrlexGraphics/RenderReconstructions.h"
-#include "OrlexGraphics/RenderVolumeManipulator.h"
-#include "OrlexGraphics/SelectionKinds.h"
+#include "OrlexGraphics/item/CameraGrid.h"
+#include "OrlexGraphics/manipulator/RenderVolumeManipulator.h"
+#include "OrlexGraphics/picking/SelectionKinds.h"
+#include "OrlexGraphics/stage/RenderCameras.h"
+#include "OrlexGraphics/stage/RenderForcePlates.h"
+#include "OrlexGraphics/stage/RenderReconstructionVolume.h"
+#include "OrlexGraphics/stage/RenderReconstructions.h"
 
 using namespace OrlexGraphics;
 

@@ -1,7 +1,7 @@
 #include "RenderTypeFixture.h"
 
-#include "OrlexGraphics/RenderAxis.h"
-#include "OrlexGraphics/RenderFloorGrid.h"
+#include "OrlexGraphics/stage/RenderAxis.h"
+#include "OrlexGraphics/stage/RenderFloorGrid.h"
 
 #include <algorithm>
 #include <limits>

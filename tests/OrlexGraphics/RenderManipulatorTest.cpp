@@ -1,6 +1,6 @@
 #include "RenderTypeFixture.h"
 
-#include "OrlexGraphics/RenderManipulator.h"
+#include "OrlexGraphics/manipulator/RenderManipulator.h"
 
 #include <algorithm>
 #include <cstdlib>

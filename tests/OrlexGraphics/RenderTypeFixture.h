@@ -4,9 +4,9 @@
 
 #include "CoreGraphics/CameraController.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/IRenderType.h"
-#include "OrlexGraphics/SceneOptions.h"
-#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/frame/IRenderType.h"
+#include "OrlexGraphics/frame/SceneOptions.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
 
 #include <QColor>
 

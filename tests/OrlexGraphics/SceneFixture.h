@@ -7,8 +7,8 @@
 #include "CoreGraphics/ShaderLibrary.h"
 #include "InMemoryHost/Dispatcher.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/FrameRenderer.h"
-#include "OrlexGraphics/OrlexScene.h"
+#include "OrlexGraphics/frame/FrameRenderer.h"
+#include "OrlexGraphics/frame/OrlexScene.h"
 
 #include <QOpenGLFramebufferObject>
 

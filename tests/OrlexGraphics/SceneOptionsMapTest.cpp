@@ -1,4 +1,4 @@
-#include "OrlexGraphics/SceneOptionsMap.h"
+#include "OrlexGraphics/item/SceneOptionsMap.h"
 
 #include <QQmlPropertyMap>
 #include <gtest/gtest.h>

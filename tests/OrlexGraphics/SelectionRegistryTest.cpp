@@ -1,6 +1,6 @@
-#include "OrlexGraphics/SelectionRegistry.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
 #include "CoreGraphics/RenderContext.h"
-#include "OrlexGraphics/Picking.h"
+#include "OrlexGraphics/picking/Picking.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 
 #include "../FBXIO/MeshFile.h"
 #include "CoreGraphics/Skin.h"

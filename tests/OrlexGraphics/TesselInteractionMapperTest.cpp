@@ -1,4 +1,4 @@
-#include "OrlexGraphics/TesselInteractionMapper.h"
+#include "OrlexGraphics/item/TesselInteractionMapper.h"
 #include "InMemoryHost/Dispatcher.h"
 #include "InMemoryHost/PreferenceFolders.h"
 

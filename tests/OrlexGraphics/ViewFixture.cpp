@@ -3,9 +3,9 @@
 #include "../WaitFor.h"
 
 #include "CoreGraphics/RenderContext.h"
-#include "OrlexGraphics/SelectionRegistry.h"
-#include "OrlexGraphics/SphereHelper.h"
-#include "OrlexGraphics/TesselInteractionMapper.h"
+#include "OrlexGraphics/item/TesselInteractionMapper.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
+#include "OrlexGraphics/stage/SphereHelper.h"
 
 #include <QMouseEvent>
 #include <QOpenGLFunctions>

@@ -7,8 +7,8 @@
 #include "CoreGraphics/Shapes.h"
 #include "Flow2Graphics/FlowScene.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/IRenderType.h"
-#include "OrlexGraphics/SceneFramebufferObject.h"
+#include "OrlexGraphics/frame/IRenderType.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
 #include "TesselPluginInterface/IDispatcher.h"
 
 #include <QImage>

@@ -1,4 +1,4 @@
-#include "OrlexGraphics/SceneFramebufferRenderer.h"
+#include "OrlexGraphics/item/SceneFramebufferRenderer.h"
 #include "ViewFixture.h"
 
 #include <QMetaProperty>

@@ -1,6 +1,6 @@
 #include "RenderTypeFixture.h"
 
-#include "OrlexGraphics/RenderVolumeManipulator.h"
+#include "OrlexGraphics/manipulator/RenderVolumeManipulator.h"
 
 #include <algorithm>
 #include <cmath>

@@ -2,7 +2,7 @@
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypes/SubjectApplicationData.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/FilePose.h"
 #include "RetargetSetupDocument/TargetConstruction.h"

@@ -2,7 +2,7 @@
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypes/NameHash.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "RetargetSetupDocument/BindPose.h"
 #include "TestSubjects.h"
 #include "math/NumberText.h"

@@ -3,7 +3,7 @@
 #include "../WaitFor.h"
 #include "TestPanel.h"
 
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 #include "TesselDataStore/StoredValue.h"
 
 #include <QTest>

@@ -2,7 +2,7 @@
 
 #include "../LogRecorder.h"
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "InMemoryHost/Application.h"
 #include "InMemoryHost/PluginContext.h"
 #include "RetargetSetupDocument/BindPose.h"

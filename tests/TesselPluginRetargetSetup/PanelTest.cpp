@@ -2,7 +2,7 @@
 
 #include "TestPanel.h"
 
-#include "OrlexGraphics/SceneFramebufferObject.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
 #include "RetargetSetupDocument/Identity.h"
 
 #include <QLayout>

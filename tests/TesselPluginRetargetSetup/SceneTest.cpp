@@ -1,8 +1,8 @@
 #include "../CoreGraphics/OffscreenContext.h"
 #include "InMemoryHost/Application.h"
 #include "NVX/ISelectionItem.h"
-#include "OrlexGraphics/FrameRenderer.h"
-#include "OrlexGraphics/RenderManipulator.h"
+#include "OrlexGraphics/frame/FrameRenderer.h"
+#include "OrlexGraphics/manipulator/RenderManipulator.h"
 #include "RetargetSetupDocument/Identity.h"
 #include "TestPanel.h"
 

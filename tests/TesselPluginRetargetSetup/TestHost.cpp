@@ -2,8 +2,8 @@
 
 #include "../QtApplication.h"
 #include "CoreGraphics/ShaderLibrary.h"
-#include "OrlexGraphics/SceneFramebufferObject.h"
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 #include "TesselParametersGUI/ParameterGroupModel.h"
 #include "studio/qmltypes/QmlModules.h"
 

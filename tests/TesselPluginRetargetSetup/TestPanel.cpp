@@ -1,7 +1,7 @@
 #include "TestPanel.h"
 
 #include "../FindItem.h"
-#include "OrlexGraphics/SceneFramebufferObject.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
 #include "RetargetSetupDocument/Identity.h"
 
 #include <QtQml>

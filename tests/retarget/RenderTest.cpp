@@ -3,11 +3,11 @@
 #include "CoreGraphics/ShaderLibrary.h"
 #include "InMemoryHost/Flow.h"
 #include "InMemoryHost/Selection.h"
-#include "OrlexGraphics/SceneFramebufferObject.h"
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 #include "TesselPluginRetargetSetup/RetargetSetupScene.h"
-#include "retarget/RenderCommand.h"
-#include "retarget/Session.h"
+#include "retarget/picture/RenderCommand.h"
+#include "retarget/subject/Session.h"
 
 #include <QImage>
 #include <QQuickWidget>

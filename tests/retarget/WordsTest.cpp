@@ -1,10 +1,10 @@
 #include "../UtilsFileSystem/Folder.h"
-#include "retarget/Elements.h"
-#include "retarget/ExitStatus.h"
-#include "retarget/HelpFormatter.h"
-#include "retarget/Messages.h"
-#include "retarget/Output.h"
-#include "retarget/Suggest.h"
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/HelpFormatter.h"
+#include "CommandLineText/Messages.h"
+#include "CommandLineText/Suggest.h"
+#include "retarget/subject/Elements.h"
+#include "retarget/text/Output.h"
 
 #include "RetargetSetupDocument/SideOfName.h"
 

@@ -1,5 +1,5 @@
 #include "../QtApplication.h"
-#include "studio/DarkStyle.h"
+#include "studio/window/DarkStyle.h"
 
 namespace
 {

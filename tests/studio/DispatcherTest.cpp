@@ -1,6 +1,6 @@
 #include "Host.h"
 
-#include "studio/QtDispatcher.h"
+#include "studio/host/QtDispatcher.h"
 
 #include <QThread>
 

@@ -1,9 +1,9 @@
 #include "Host.h"
 
-#include "retarget/Display.h"
-#include "studio/LogModel.h"
-#include "studio/LogPanel.h"
-#include "studio/QtDispatcher.h"
+#include "CommandLineText/Display.h"
+#include "studio/host/QtDispatcher.h"
+#include "studio/log/LogModel.h"
+#include "studio/log/LogPanel.h"
 
 #include <QAbstractItemModelTester>
 #include <QApplication>

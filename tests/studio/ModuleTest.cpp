@@ -1,14 +1,14 @@
 #include "Host.h"
 #include "module/TestModule.h"
 
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 #include "TesselPluginInterface/IParameterGroup.h"
 #include "TesselPluginInterface/ISelectionManager.h"
-#include "studio/Module.h"
-#include "studio/Preferences.h"
-#include "studio/RetargetPanel.h"
-#include "studio/Services.h"
-#include "studio/StudioWindow.h"
+#include "studio/host/Module.h"
+#include "studio/host/Preferences.h"
+#include "studio/host/Services.h"
+#include "studio/panel/RetargetPanel.h"
+#include "studio/window/StudioWindow.h"
 
 #include <QDockWidget>
 #include <QLabel>

@@ -1,5 +1,5 @@
 #include "studio/Options.h"
-#include "retarget/ExitStatus.h"
+#include "CommandLineText/ExitStatus.h"
 
 #include <gtest/gtest.h>
 

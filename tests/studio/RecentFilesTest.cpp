@@ -1,7 +1,7 @@
 #include "Host.h"
 
-#include "studio/FileKind.h"
-#include "studio/RecentFiles.h"
+#include "studio/panel/FileKind.h"
+#include "studio/panel/RecentFiles.h"
 
 namespace
 {

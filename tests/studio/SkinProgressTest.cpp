@@ -1,10 +1,10 @@
-#include "studio/SkinProgress.h"
+#include "studio/window/SkinProgress.h"
 
 #include "../OrlexGraphics/HeldJobs.h"
 #include "Host.h"
-#include "OrlexGraphics/SkinCache.h"
-#include "studio/JobRunner.h"
-#include "studio/QtDispatcher.h"
+#include "OrlexGraphics/skins/SkinCache.h"
+#include "studio/host/JobRunner.h"
+#include "studio/host/QtDispatcher.h"
 
 #include <QLabel>
 #include <QProgressBar>

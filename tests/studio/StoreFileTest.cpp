@@ -6,8 +6,8 @@
 #include "TesselDataStore/DataWriter.h"
 #include "TesselDataStore/StoredValue.h"
 #include "TesselPluginInterface/PathTypes.h"
-#include "studio/Preferences.h"
-#include "studio/StoreFile.h"
+#include "studio/host/Preferences.h"
+#include "studio/host/StoreFile.h"
 
 #include <limits>
 

@@ -5,12 +5,12 @@
 #include "TesselPluginInterface/IParameter.h"
 #include "TesselPluginInterface/IParameterGroup.h"
 #include "TesselPluginInterface/PathTypes.h"
-#include "studio/LogModel.h"
-#include "studio/Preferences.h"
-#include "studio/PreferencesDialog.h"
-#include "studio/RetargetPanel.h"
-#include "studio/Services.h"
-#include "studio/StudioWindow.h"
+#include "studio/host/Preferences.h"
+#include "studio/host/Services.h"
+#include "studio/log/LogModel.h"
+#include "studio/panel/RetargetPanel.h"
+#include "studio/window/PreferencesDialog.h"
+#include "studio/window/StudioWindow.h"
 
 #include <QAbstractButton>
 #include <QAbstractItemView>

@@ -2,7 +2,7 @@
 
 #include "WindowFixture.h"
 
-#include "studio/Services.h"
+#include "studio/host/Services.h"
 
 #include <QFile>
 

@@ -4,7 +4,7 @@
 #include "Eye.h"
 #include "WindowFixture.h"
 
-#include "studio/Services.h"
+#include "studio/host/Services.h"
 
 #include <QFile>
 #include <QRegularExpression>

@@ -4,9 +4,9 @@
 #include "../PictureTest.h"
 #include "WindowFixture.h"
 
-#include "OrlexGraphics/SkinCache.h"
-#include "studio/LogModel.h"
-#include "studio/Services.h"
+#include "OrlexGraphics/skins/SkinCache.h"
+#include "studio/host/Services.h"
+#include "studio/log/LogModel.h"
 
 #include <QFile>
 #include <QPainter>

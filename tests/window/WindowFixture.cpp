@@ -1,10 +1,10 @@
 #include "WindowFixture.h"
 
 #include "../QtApplication.h"
-#include "studio/DarkStyle.h"
-#include "studio/Preferences.h"
-#include "studio/RetargetPanel.h"
-#include "studio/Services.h"
+#include "studio/host/Preferences.h"
+#include "studio/host/Services.h"
+#include "studio/panel/RetargetPanel.h"
+#include "studio/window/DarkStyle.h"
 
 #include <QAbstractItemModel>
 #include <QFile>

@@ -2,7 +2,7 @@
 
 #include "Operator.h"
 
-#include "studio/StudioWindow.h"
+#include "studio/window/StudioWindow.h"
 
 #include <gtest/gtest.h>
 

@@ -2,7 +2,7 @@
 
 #include "CoreOrlexQRTIO/JointGeometry.h"
 #include "CoreOrlexQRTIO/SubjectQRTExtras.h"
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+#include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 
 #include <optional>
 #include <span>

@@ -1,6 +1,6 @@
 #include "CoreOrlexQRTIO/JointGeometry.h"
 
-#include "CoreOrlexTypesUtils/AxisOrientation.h"
+#include "CoreOrlexTypesUtils/rigidbody/AxisOrientation.h"
 
 #include <algorithm>
 #include <cmath>

@@ -3,7 +3,7 @@
 #include "CoreOrlexQRTIO/Limits.h"
 #include "CoreOrlexQRTIO/ReadChecks.h"
 #include "CoreOrlexTypes/NameHash.h"
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+#include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
 #include "UtilsFileSystem/Files.h"

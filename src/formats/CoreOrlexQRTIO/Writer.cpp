@@ -8,7 +8,7 @@
 #include "CoreOrlexQRTIO/Limits.h"
 #include "CoreOrlexQRTIO/WriteSections.h"
 #include "CoreOrlexTypes/JointType.h"
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+#include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
 #include "UtilsFileSystem/SaveFile.h"

@@ -1,7 +1,7 @@
 #include "RetargetSetupDocument/BindPose.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
-#include "CoreOrlexTypesUtils/PoseVector.h"
+#include "CoreOrlexTypesUtils/joints/PoseVector.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/Identity.h"
 

@@ -1,7 +1,7 @@
 #include "RetargetSetupDocument/DefaultPose.h"
 
 #include "CoreOrlexTypes/Subject.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 
 #include <boost/algorithm/string/case_conv.hpp>
 

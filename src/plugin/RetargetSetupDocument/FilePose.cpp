@@ -3,7 +3,7 @@
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/Subject.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/AngleAxis.h"
 #include "RetargetSetupDocument/GlobalScale.h"

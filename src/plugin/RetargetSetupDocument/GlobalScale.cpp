@@ -1,6 +1,6 @@
 #include "RetargetSetupDocument/GlobalScale.h"
 
-#include "CoreOrlexTypesUtils/UnusedParameters.h"
+#include "CoreOrlexTypesUtils/observations/UnusedParameters.h"
 
 #include <cmath>
 #include <set>

@@ -1,7 +1,7 @@
 #include "RetargetSetupDocument/RetargetSetup.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/GlobalScale.h"
 #include "RetargetSetupDocument/Identity.h"

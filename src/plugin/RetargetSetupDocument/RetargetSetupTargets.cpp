@@ -1,7 +1,7 @@
 // The commands of VRetargetSetup that edit targets and joints.
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/Identity.h"

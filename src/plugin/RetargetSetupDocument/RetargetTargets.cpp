@@ -2,7 +2,7 @@
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypes/NameHash.h"
-#include "CoreOrlexTypesUtils/UnusedObservations.h"
+#include "CoreOrlexTypesUtils/observations/UnusedObservations.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/StateExpressions.h"

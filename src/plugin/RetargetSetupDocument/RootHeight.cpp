@@ -2,7 +2,7 @@
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypes/Subject.h"
-#include "CoreOrlexTypesUtils/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/GlobalScale.h"

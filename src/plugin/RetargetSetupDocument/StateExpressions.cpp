@@ -1,6 +1,6 @@
 #include "RetargetSetupDocument/StateExpressions.h"
 
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+#include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupDocument/Identity.h"
 #include "RetargetSetupDocument/ParseNumber.h"

@@ -1,7 +1,7 @@
 #include "TesselPluginRetargetSetup/RetargetSetupWidget.h"
 
-#include "OrlexGraphics/SceneFramebufferObject.h"
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 #include "OrlexQtQuick/GuardedCallback.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/RetargetSetupSelection.h"

@@ -1,6 +1,6 @@
 #include "TesselPluginRetargetSetup/ShownTarget.h"
 
-#include "CoreOrlexTypesUtils/StaticExpressionParser.h"
+#include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
 #include "math/NumberText.h"
 

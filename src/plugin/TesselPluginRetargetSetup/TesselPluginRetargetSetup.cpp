@@ -1,7 +1,7 @@
 #include "TesselPluginRetargetSetup/TesselPluginRetargetSetup.h"
 
-#include "OrlexGraphics/SceneFramebufferObject.h"
-#include "OrlexGraphics/TesselInteractionMapper.h"
+#include "OrlexGraphics/item/SceneFramebufferObject.h"
+#include "OrlexGraphics/item/TesselInteractionMapper.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/RetargetSetupSelection.h"
 #include "TesselPluginInterface/IPluginContext.h"

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "Flow2Graphics/IFlowRenderType.h"
-#include "OrlexGraphics/RenderCameras.h"
+#include "OrlexGraphics/stage/RenderCameras.h"
 
 #include <memory>
 

@@ -1,6 +1,6 @@
 #include "Flow2Graphics/FlowRenderFloorGrid.h"
 
-#include "OrlexGraphics/RenderFloorGrid.h"
+#include "OrlexGraphics/stage/RenderFloorGrid.h"
 
 namespace Flow2Graphics
 {

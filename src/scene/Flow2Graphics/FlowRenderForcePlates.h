@@ -2,7 +2,7 @@
 
 #include "Flow2Graphics/IFlowRenderType.h"
 #include "Flow2TypesUtils/ItemCache.h"
-#include "OrlexGraphics/RenderForcePlates.h"
+#include "OrlexGraphics/stage/RenderForcePlates.h"
 
 #include <memory>
 #include <vector>

@@ -5,7 +5,7 @@
 #include "CoreGraphics/Uniform.h"
 #include "Flow2Graphics/IFlowRenderType.h"
 #include "Flow2TypesUtils/ItemCache.h"
-#include "OrlexGraphics/IRenderType.h"
+#include "OrlexGraphics/frame/IRenderType.h"
 
 #include <QFont>
 #include <QString>

@@ -1,8 +1,8 @@
 #include "Flow2Graphics/FlowRenderReconstructionVolume.h"
 
 #include "Flow2TypesUtils/ParameterSet.h"
-#include "OrlexGraphics/RenderReconstructionVolume.h"
-#include "OrlexGraphics/RenderVolumeManipulator.h"
+#include "OrlexGraphics/manipulator/RenderVolumeManipulator.h"
+#include "OrlexGraphics/stage/RenderReconstructionVolume.h"
 
 namespace Flow2Graphics
 {

@@ -2,7 +2,7 @@
 
 #include "Flow2Graphics/IFlowRenderType.h"
 #include "Flow2TypesUtils/ItemCache.h"
-#include "OrlexGraphics/RenderReconstructions.h"
+#include "OrlexGraphics/stage/RenderReconstructions.h"
 
 #include <memory>
 #include <vector>

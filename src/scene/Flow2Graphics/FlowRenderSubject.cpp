@@ -5,8 +5,8 @@
 #include "CoreGraphics/Skin.h"
 #include "DebugServices/GlobalLog.h"
 #include "Flow2Graphics/SubjectShapes.h"
-#include "OrlexGraphics/SelectionRegistry.h"
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 #include "numerics/AllFinite.h"
 
 #include <algorithm>

@@ -6,7 +6,7 @@
 #include "CoreOrlexTypesUtils/SubjectKinematics.h"
 #include "Flow2Graphics/RenderSubjectData.h"
 #include "Flow2Graphics/SubjectTypes.h"
-#include "OrlexGraphics/CameraDefinition.h"
+#include "OrlexGraphics/overlays/CameraDefinition.h"
 
 #include <QMatrix4x4>
 #include <QVector3D>

@@ -1,7 +1,7 @@
 #include "Flow2Graphics/FlowRenderSubjectList.h"
 
 #include "Flow2TypesUtils/ItemCatalogue.h"
-#include "OrlexGraphics/SkinCache.h"
+#include "OrlexGraphics/skins/SkinCache.h"
 
 using TesselPluginInterface::IFlowFrame;
 

@@ -3,7 +3,7 @@
 #include "Flow2TypesUtils/ItemCache.h"
 #include "Flow2TypesUtils/SceneItems.h"
 #include "NVX/CountedPointer.h"
-#include "OrlexGraphics/OrlexScene.h"
+#include "OrlexGraphics/frame/OrlexScene.h"
 #include "TesselPluginInterface/IFlowFrame.h"
 
 namespace OrlexGraphics

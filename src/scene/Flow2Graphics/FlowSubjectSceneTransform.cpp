@@ -1,7 +1,7 @@
 #include "Flow2Graphics/FlowSubjectSceneTransform.h"
 
 #include "CoreOrlexTypes/SubjectState.h"
-#include "CoreOrlexTypesUtils/PoseVector.h"
+#include "CoreOrlexTypesUtils/joints/PoseVector.h"
 #include "Flow2TypesUtils/ItemCatalogue.h"
 #include "Flow2TypesUtils/ParameterSet.h"
 

@@ -3,10 +3,10 @@
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "Flow2Graphics/SubjectShapes.h"
-#include "OrlexGraphics/HandleSize.h"
-#include "OrlexGraphics/MeshFile.h"
-#include "OrlexGraphics/SelectionRegistry.h"
-#include "OrlexGraphics/SphereHelper.h"
+#include "OrlexGraphics/manipulator/HandleSize.h"
+#include "OrlexGraphics/manipulator/MeshFile.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
+#include "OrlexGraphics/stage/SphereHelper.h"
 
 #include <qopengl.h>
 

@@ -6,9 +6,9 @@
 #include "CoreGraphics/Uniform.h"
 #include "Flow2Graphics/RenderSubjectData.h"
 #include "Flow2Graphics/SubjectTypes.h"
-#include "OrlexGraphics/IRenderType.h"
-#include "OrlexGraphics/SceneOptions.h"
-#include "OrlexGraphics/SkinRenderer.h"
+#include "OrlexGraphics/frame/IRenderType.h"
+#include "OrlexGraphics/frame/SceneOptions.h"
+#include "OrlexGraphics/skins/SkinRenderer.h"
 
 #include <array>
 #include <memory>

@@ -3,7 +3,7 @@
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "Flow2Graphics/RenderSubjectDynamics.h"
-#include "OrlexGraphics/SphereHelper.h"
+#include "OrlexGraphics/stage/SphereHelper.h"
 
 #include <qopengl.h>
 

@@ -5,7 +5,7 @@
 #include "CoreGraphics/Uniform.h"
 #include "Flow2Graphics/RenderSubjectData.h"
 #include "Flow2Graphics/SubjectTypes.h"
-#include "OrlexGraphics/IRenderType.h"
+#include "OrlexGraphics/frame/IRenderType.h"
 
 #include <array>
 #include <memory>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "NVX/ISelectionItem.h"
-#include "OrlexGraphics/SelectionKinds.h"
+#include "OrlexGraphics/picking/SelectionKinds.h"
 
 #include <array>
 #include <cstddef>

@@ -1,0 +1,149 @@
+#include "CommandLineText/Parsing.h"
+#include "retarget/commands/Commands.h"
+#include "retarget/subject/Elements.h"
+#include "retarget/subject/SubjectFile.h"
+#include "retarget/text/Output.h"
+
+#include "ComputeSubjectFK/SegmentFKInterfaces.h"
+#include "CoreOrlexTypesUtils/SubjectKinematics.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/joints/PoseVector.h"
+#include "DebugServices/GlobalLog.h"
+
+#include <algorithm>
+
+namespace CommandLine
+{
+namespace
+{
+
+using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectParametrised;
+using CoreOrlexTypes::VSubjectRecord;
+namespace SubjectParametrisedConverter = CoreOrlexTypesUtils::SubjectParametrisedConverter;
+
+struct VFkSettings
+{
+	std::string m_File;
+	std::string m_Pose = "bind";
+	std::string m_State;
+};
+
+/// The subject in numbers, with kinematics; what has none is told and left out.
+CoreOrlexTypesUtils::VSubjectKinematics MakeKinematics(const std::string& i_rFile, const VSubjectRecord& i_rRecord)
+{
+	VSubject subject;
+	const auto failures = SubjectParametrisedConverter::ConvertAllOfSubject(i_rRecord.m_SubjectParametrised, subject);
+	const auto leaveOut = [&](std::size_t i_Index, const std::string& i_rReason)
+	{
+		const auto& rNamed = i_rRecord.m_SubjectApplicationData.m_Targets;
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "Target #%1% \"%2%\" is left out: %3%", i_Index,
+		    i_Index < rNamed.size() ? rNamed[i_Index].m_Name : std::string(), i_rReason);
+	};
+	for (const auto& rFailure : failures)
+	{
+		leaveOut(rFailure.m_Index, "its state does not evaluate: " + rFailure.m_Reason);
+		subject.m_Targets[rFailure.m_Index].m_Type = VSubject::VTarget::EBadTargetType;
+	}
+	CoreOrlexTypesUtils::VSubjectKinematics kinematics(subject);
+	if (!kinematics.IsBuilt())
+		throw VCommandError(
+		    EBadInput, "\"" + i_rFile + "\" has segments that make no tree, or more than one: they have no kinematics");
+	for (std::size_t i = 0; i < subject.m_Targets.size(); ++i)
+		if (!kinematics.Target(i)
+		    && std::ranges::find(failures, i, &SubjectParametrisedConverter::VTargetFailure::m_Index) == failures.end())
+			leaveOut(i, "it does not fit its type, or has one without kinematics");
+	return kinematics;
+}
+
+std::vector<double> State(const VFkSettings& i_rSettings, const VSubjectParametrised& i_rSubject, std::size_t i_Size)
+{
+	if (!i_rSettings.m_State.empty())
+	{
+		const std::vector<double> state = ParseList(i_rSettings.m_State, "--state");
+		if (state.size() != i_Size)
+			throw VCommandError(EWrongUsage,
+			    "--state: the joints of \"" + i_rSettings.m_File + "\" take " + std::to_string(i_Size)
+			        + " numbers, not " + std::to_string(state.size()));
+		return state;
+	}
+	using VJoint = VSubjectParametrised::VJoint;
+	const auto pStatistic = i_rSettings.m_Pose == "mean" ? &VJoint::m_Mean
+	    : i_rSettings.m_Pose == "tpose"                  ? &VJoint::m_TPoseMean
+	                                                     : &VJoint::m_BindPose;
+	if (i_Size > 0
+	    && std::all_of(i_rSubject.m_Segments.begin(), i_rSubject.m_Segments.end(),
+	        [&](const auto& i_rSegment) { return (i_rSegment.m_Joint.*pStatistic).empty(); }))
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "\"%1%\" holds no %2% pose: zeros take its place", i_rSettings.m_File,
+		    i_rSettings.m_Pose);
+	return CoreOrlexTypesUtils::PoseVector(i_rSubject, pStatistic);
+}
+
+/// One entry for each of a subject's markers, or rotation observations.
+template <typename TNamed, typename TValue>
+VJson ObservationsToJson(const std::vector<TNamed>& i_rNamed, const std::vector<TValue>& i_rValues,
+    const std::vector<bool>& i_rValid, const char* i_pKey)
+{
+	VJson list = VJson::array();
+	for (std::size_t i = 0; i < i_rNamed.size(); ++i)
+	{
+		VJson item = VJson::object();
+		item["name"] = i_rNamed[i].m_Name;
+		item[i_pKey] = i_rValues[i];
+		item["valid"] = bool(i_rValid[i]);
+		list.push_back(std::move(item));
+	}
+	return list;
+}
+
+EExitStatus ShowPoses(const VFkSettings& i_rSettings)
+{
+	const VSubjectRecord record = ReadSubjectFile(i_rSettings.m_File).m_Record;
+	const VSubjectParametrised& rParametrised = record.m_SubjectParametrised;
+	CoreOrlexTypesUtils::VSubjectKinematics kinematics = MakeKinematics(i_rSettings.m_File, record);
+	kinematics.Update(State(i_rSettings, rParametrised, kinematics.NumberOfStates()).data());
+
+	VJson segments = VJson::array();
+	for (std::size_t i = 0; i < rParametrised.m_Segments.size(); ++i)
+	{
+		const Rotation::VPose<double> pose = kinematics.Segment(i).SegmentPose();
+		VJson segment = VJson::object();
+		segment["name"] = rParametrised.m_Segments[i].m_Name;
+		segment["rotation"] = pose.R;
+		segment["translation"] = pose.t;
+		segments.push_back(std::move(segment));
+	}
+	VJson result = VJson::object();
+	result["segments"] = std::move(segments);
+	std::vector<bool> valid;
+	std::vector<Rotation::VVector3> positions;
+	kinematics.ComputeMarkers(positions, valid);
+	result["markers"] = ObservationsToJson(rParametrised.m_Markers, positions, valid, "position");
+	std::vector<Rotation::VMatrix3> orientations;
+	kinematics.ComputeRotations(orientations, valid);
+	result["rotations"] = ObservationsToJson(rParametrised.m_Rotations, orientations, valid, "rotation");
+	PrintJson(result);
+	return EFine;
+}
+
+} // namespace
+
+VCommand AddFkCommand(CLI::App& io_rProgram)
+{
+	CLI::App* const pApp = AddCommand(io_rProgram, "fk",
+	    "Show where the segments, markers and rotation observations of a skeleton or retarget file stand in the "
+	    "world, as JSON: rotations row by row, translations in millimetres",
+	    {"fk hero.qrr", "fk performer.qrs --pose tpose", "fk arm.qrs --state 0,0,0,0,0,1000,0.5"});
+	const auto pSettings = std::make_shared<VFkSettings>();
+	pApp->add_option("FILE", pSettings->m_File, "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)")
+	    ->required();
+	pApp->add_option("--pose", pSettings->m_Pose, "Which of the poses in the file (default: bind)")
+	    ->option_text("bind|mean|tpose")
+	    ->check(OneOf({"bind", "mean", "tpose"}));
+	pApp->add_option("--state", pSettings->m_State,
+	        "A pose of your own: the values of all joints in the order of the segments, radians and mm")
+	    ->option_text("V,V,...");
+	return {pApp, [pSettings] { return ShowPoses(*pSettings); }};
+}
+
+} // namespace CommandLine

@@ -1,0 +1,204 @@
+#include "CommandLineText/HelpFormatter.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/commands/Commands.h"
+#include "retarget/subject/Residuals.h"
+#include "retarget/subject/Session.h"
+#include "retarget/text/Output.h"
+#include "retarget/text/Table.h"
+
+#include "CoreOrlexTypes/Fields.h"
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupDocument/RetargetTargets.h"
+
+#include <numbers>
+#include <unistd.h>
+
+namespace CommandLine
+{
+namespace
+{
+
+struct VTargetsSettings
+{
+	std::string m_File;
+	std::string m_Source;
+	bool m_bStates = false;
+};
+
+/// What is shown of one target; empty texts for what it does not have.
+struct VTargetLine
+{
+	std::string m_Name;
+	std::string m_Type;
+	std::string m_Source;
+	std::string m_Target;
+	double m_Weight = 0.0;
+	std::vector<std::string> m_State;
+	VTargetResidual m_Residual;
+};
+
+double Degrees(double i_Radians)
+{
+	return i_Radians * 180.0 / std::numbers::pi;
+}
+
+std::string ResidualText(const VResidual& i_rResidual)
+{
+	if (i_rResidual.m_Distance)
+		return Fixed(*i_rResidual.m_Distance, 3) + " mm";
+	if (i_rResidual.m_Angle)
+		return Fixed(Degrees(*i_rResidual.m_Angle), 3) + " deg";
+	return "-";
+}
+
+VJson ResidualToJson(const VResidual& i_rResidual)
+{
+	if (i_rResidual.m_Distance)
+		return *i_rResidual.m_Distance;
+	return i_rResidual.m_Angle ? VJson(Degrees(*i_rResidual.m_Angle)) : VJson();
+}
+
+/// A solver goes by the targets' own kinematics, the editing tools store offsets from the segments' poses.
+void TellDisagreement(const std::vector<VTargetLine>& i_rLines)
+{
+	std::vector<VTargetResidual> residuals;
+	for (const VTargetLine& rLine : i_rLines)
+		residuals.push_back(rLine.m_Residual);
+	const std::optional<std::size_t> worst = WorstDisagreement(residuals);
+	if (worst)
+		NVX_LOG(c_pCategory, NVX::ELogWarning,
+		    "A solver sees targets elsewhere than their offsets say, at worst #%1% \"%2%\": %3% by the offset, %4% by "
+		    "the target's kinematics; post poses of segments and orientations of rotation targets do this",
+		    *worst, i_rLines[*worst].m_Name, ResidualText(residuals[*worst].m_Offset),
+		    ResidualText(residuals[*worst].m_Target));
+}
+
+std::vector<VTargetLine> Lines(VSession& io_rSession, bool i_bResiduals)
+{
+	const VRetargetSetup::VSubjectValues target = io_rSession.Document().TargetValues();
+	const auto& rSubject = *target.m_pParametrised;
+	std::vector<VTargetLine> lines(rSubject.m_Targets.size());
+	std::vector<VTargetResidual> residuals(lines.size());
+	if (i_bResiduals)
+		residuals = Residuals(io_rSession.Document().SourceValues(), target);
+	for (std::size_t i = 0; i < lines.size(); ++i)
+	{
+		const auto& rTarget = rSubject.m_Targets[i];
+		VTargetLine& rLine = lines[i];
+		if (i < target.m_pApplicationData->m_Targets.size())
+			rLine.m_Name = target.m_pApplicationData->m_Targets[i].m_Name;
+		rLine.m_Type = CoreOrlexTypes::EnumeratorName(rTarget.m_Type);
+		for (const std::string& rName : FollowedNames(rSubject, rTarget))
+			rLine.m_Source += (rLine.m_Source.empty() ? "" : ", ") + rName;
+		if (const std::string* pName = RetargetSetup::TargetSegmentName(rSubject, rTarget))
+			rLine.m_Target = *pName;
+		rLine.m_Weight = rTarget.m_Weight;
+		rLine.m_State = rTarget.m_StateExpressions;
+		rLine.m_Residual = residuals[i];
+	}
+	return lines;
+}
+
+VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
+{
+	VJson list = VJson::array();
+	for (const VTargetLine& rLine : i_rLines)
+	{
+		VJson item = VJson::object();
+		item["index"] = list.size();
+		item["name"] = rLine.m_Name;
+		item["type"] = rLine.m_Type;
+		item["source"] = rLine.m_Source;
+		item["target"] = rLine.m_Target;
+		item["weight"] = rLine.m_Weight;
+		item["state"] = rLine.m_State;
+		if (i_bResiduals)
+		{
+			const VResidual& rOffset = rLine.m_Residual.m_Offset;
+			item["distance"] = ResidualToJson({rOffset.m_Distance, {}});
+			item["angle"] = ResidualToJson({{}, rOffset.m_Angle});
+			item["targetResidual"] = ResidualToJson(rLine.m_Residual.m_Target);
+		}
+		list.push_back(std::move(item));
+	}
+	return list;
+}
+
+/// "Point" for "LocalPointToWorldPoint": what the type has in the target segment.
+std::string ShortType(std::string i_Type)
+{
+	if (i_Type.starts_with("Local"))
+		i_Type.erase(0, 5);
+	return i_Type.substr(0, i_Type.find("To"));
+}
+
+VTable LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals, bool i_bStates)
+{
+	VTable table;
+	table.AddColumn("INDEX", VTable::ERight);
+	table.AddColumn("TYPE", VTable::ELeft);
+	table.AddColumn("SOURCE", VTable::ELeft);
+	table.AddColumn("TARGET", VTable::ELeft);
+	table.AddColumn("WEIGHT", VTable::ERight);
+	if (i_bResiduals)
+		table.AddColumn("RESIDUAL", VTable::ERight);
+	if (i_bStates)
+	{
+		table.AddColumn("NAME", VTable::ELeft);
+		table.AddColumn("STATE", VTable::ELeft);
+	}
+	for (std::size_t i = 0; i < i_rLines.size(); ++i)
+	{
+		const VTargetLine& rLine = i_rLines[i];
+		std::vector<std::string> texts{
+		    std::to_string(i), ShortType(rLine.m_Type), rLine.m_Source, rLine.m_Target, Shortest(rLine.m_Weight)};
+		if (i_bResiduals)
+			texts.push_back(ResidualText(rLine.m_Residual.m_Offset));
+		if (i_bStates)
+		{
+			texts.push_back(rLine.m_Name);
+			std::string state;
+			for (const std::string& rExpression : rLine.m_State)
+				state += (state.empty() ? "" : " ") + rExpression;
+			texts.push_back(state);
+		}
+		table.AddRow(texts);
+	}
+	return table;
+}
+
+EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)
+{
+	VSession session;
+	session.LoadTarget(i_rSettings.m_File);
+	const bool bResiduals = !i_rSettings.m_Source.empty();
+	if (bResiduals)
+		session.LoadSource(i_rSettings.m_Source);
+	const std::vector<VTargetLine> lines = Lines(session, bResiduals);
+	TellDisagreement(lines);
+	VTable table = LinesToTable(lines, bResiduals, true);
+	if (!i_rSettings.m_bStates && table.LineWidth() > TerminalWidth())
+		table = LinesToTable(lines, bResiduals, false);
+	PrintResult(LinesToJson(lines, bResiduals), table.Text(HasColours(STDOUT_FILENO)));
+	return EFine;
+}
+
+} // namespace
+
+VCommand AddTargetsCommand(CLI::App& io_rProgram)
+{
+	CLI::App* const pApp = AddCommand(io_rProgram, "targets",
+	    "Show the targets of a retarget subject as a table; with the performer's skeleton also how far each is, in the "
+	    "bind poses, from what it asks for: mm for positions, degrees for rotations",
+	    {"targets hero.qrr", "targets hero.qrr --source performer.qrs",
+	        "targets hero.qrr --source performer.qrs --json | jq '.[] | select(.distance > 1)'"});
+	const auto pSettings = std::make_shared<VTargetsSettings>();
+	pApp->add_option("FILE.qrr", pSettings->m_File, "The retarget subject, or a legacy one (.qrx)")->required();
+	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton, for the residuals")
+	    ->option_text("FILE.qrs");
+	pApp->add_flag("--states", pSettings->m_bStates,
+	    "With the names and states of the targets, which are shown by themselves where the terminal is wide enough");
+	return {pApp, [pSettings] { return ShowTargets(*pSettings); }};
+}
+
+} // namespace CommandLine

@@ -1,0 +1,150 @@
+#include "retarget/picture/Picture.h"
+
+#include "CommandLineText/Display.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/subject/Session.h"
+#include "retarget/text/Output.h"
+
+#include "CoreGraphics/ShaderLibrary.h"
+#include "InMemoryHost/Flow.h"
+#include "InMemoryHost/Selection.h"
+#include "NVX/Status.h"
+#include "OrlexGraphics/frame/FrameRenderer.h"
+#include "OrlexGraphics/item/SceneOptionsMap.h"
+#include "OrlexGraphics/skins/SkinCache.h"
+#include "TesselPluginRetargetSetup/RetargetSetupScene.h"
+#include "UtilsFileSystem/Paths.h"
+#include "UtilsFileSystem/SaveFile.h"
+
+#include <QBuffer>
+#include <QGuiApplication>
+#include <QImage>
+#include <QOffscreenSurface>
+#include <QOpenGLContext>
+#include <QOpenGLFramebufferObject>
+#include <QQmlPropertyMap>
+
+#include <algorithm>
+
+namespace CommandLine
+{
+namespace
+{
+
+static_assert(c_Views.size() == CoreGraphics::ECameraTypeCount);
+
+std::uint32_t CameraType(const std::string& i_rView)
+{
+	return static_cast<std::uint32_t>(std::find(c_Views.begin(), c_Views.end(), i_rView) - c_Views.begin());
+}
+
+/// As the panel's view begins.
+OrlexGraphics::VSceneOptions ViewOptions()
+{
+	OrlexGraphics::VSceneOptions options;
+	QQmlPropertyMap map;
+	OrlexGraphics::WriteOptionsToMap(options, map);
+	const QVariantMap begin = VRetargetSetupScene::ViewOptions();
+	for (auto it = begin.begin(); it != begin.end(); ++it)
+		map.insert(it.key(), it.value());
+	OrlexGraphics::ReadOptionsFromMap(map, options);
+	return options;
+}
+
+/// All segments of both subjects, as the preview knows them.
+std::vector<NVX::ISelectionItem> Segments(const VRetargetSetup& i_rDocument)
+{
+	std::vector<NVX::ISelectionItem> items;
+	const auto add = [&](const VRetargetSetup::VSubjectValues& i_rValues, std::uint32_t i_Kind)
+	{
+		if (i_rValues.m_pParametrised)
+			for (std::uint32_t i = 0; i < i_rValues.m_pParametrised->m_Segments.size(); ++i)
+				items.push_back({i_Kind, i_rValues.m_pParametrised->m_SubjectId, i, {}});
+	};
+	add(i_rDocument.SourceValues(), NVX::ESelectionSourceSegment);
+	add(i_rDocument.TargetValues(), NVX::ESelectionTargetSegment);
+	return items;
+}
+
+/// With a context current.
+QImage Draw(VSession& io_rSession, const VRenderSettings& i_rSettings)
+{
+	const QSize size(i_rSettings.m_Width, i_rSettings.m_Height);
+	const auto pSkins = NVX::MakeShared<OrlexGraphics::VSkinCache>(io_rSession.Dispatcher());
+	pSkins->SetMeshRules(FBXIO::c_FaithfulMeshes);
+	if (!i_rSettings.m_Skins.empty())
+		pSkins->SetFolders(OrlexGraphics::c_pSubjectSkins, {UtilsFileSystem::PathFromUtf8(i_rSettings.m_Skins)});
+	const auto pScene =
+	    NVX::MakeShared<VRetargetSetupScene>(std::make_shared<CoreGraphics::VShaderLibrary>(), io_rSession.Dispatcher(),
+	        std::make_shared<InMemoryHost::VSelectionManager>(), pSkins, io_rSession.SharedDocument(),
+	        NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory), false);
+	OrlexGraphics::VFrameRenderer renderer;
+	renderer.Initialise();
+	CoreGraphics::VCameraController& rCamera = renderer.m_Input.m_Camera;
+	renderer.m_Input.m_Options = ViewOptions();
+	rCamera.SetSize(size);
+	rCamera.m_Type = CameraType(i_rSettings.m_View);
+
+	QOpenGLFramebufferObject target(size, renderer.TargetFormat());
+	if (!target.isValid())
+		throw VCommandError(EBadOutput,
+		    "The display's OpenGL cannot draw a picture of " + std::to_string(size.width()) + "x"
+		        + std::to_string(size.height()) + " pixels: give a smaller --size");
+	renderer.SetSize(size);
+	renderer.SetScene(pScene);
+	// What was posted shows the document's frame; what the frame update places is there with the next exchange.
+	io_rSession.Settle();
+	pScene->Synchronise();
+	renderer.Update();
+	pScene->Synchronise();
+	rCamera.m_bYUp = pScene->YUp();
+	rCamera.Fit(pScene->GetBounds(Segments(io_rSession.Document())), true);
+	renderer.Render(target);
+	renderer.Paint();
+	return target.toImage();
+}
+
+void Save(const QImage& i_rPicture, const std::string& i_rPath)
+{
+	QByteArray bytes;
+	QBuffer buffer(&bytes);
+	std::string error = "The picture could not be made";
+	const bool bMade = i_rPicture.save(&buffer, "PNG");
+	const std::string_view content(bytes.constData(), std::size_t(bytes.size()));
+	RequireNoWarnings();
+	if (bMade && i_rPath == "-")
+		Print(content);
+	else if (!bMade
+	    || UtilsFileSystem::SaveFile(UtilsFileSystem::PathFromUtf8(i_rPath), content, error) != NVX::Status::c_Success)
+		throw VCommandError(EBadOutput, error);
+	PrintResult({{"output", i_rPath}, {"width", i_rPicture.width()}, {"height", i_rPicture.height()}}, "");
+}
+
+} // namespace
+
+EExitStatus RenderPicture(const VRenderSettings& i_rSettings)
+{
+	VSession session;
+	session.LoadTarget(i_rSettings.m_In);
+	if (!i_rSettings.m_Source.empty())
+		session.LoadSource(i_rSettings.m_Source);
+
+	PrepareDisplay({c_pCategory, EBadOutput,
+	    "There is no display to draw with: set DISPLAY to one that has OpenGL, or run the command with \"xvfb-run "
+	    "-a\""});
+	int count = 1;
+	char name[] = "retarget";
+	char* pArguments[] = {name, nullptr};
+	const QGuiApplication application(count, pArguments);
+	QOffscreenSurface surface;
+	surface.create();
+	QOpenGLContext context;
+	if (!context.create() || !context.makeCurrent(&surface))
+		throw VCommandError(EBadOutput,
+		    "This display (" + QGuiApplication::platformName().toStdString()
+		        + ") has no OpenGL to draw with: try LIBGL_ALWAYS_SOFTWARE=1, or run the command with \"xvfb-run -a\"");
+	Save(Draw(session, i_rSettings), i_rSettings.m_Out.m_Path);
+	return EFine;
+}
+
+} // namespace CommandLine

@@ -1,0 +1,35 @@
+#pragma once
+
+#include "CommandLineText/ExitStatus.h"
+#include "retarget/text/OutputFile.h"
+
+#include <array>
+#include <cstdint>
+#include <functional>
+#include <string>
+
+namespace CommandLine
+{
+
+/// What "retarget render" is asked for.
+struct VRenderSettings
+{
+	std::string m_In;
+	/// Empty for none.
+	std::string m_Source;
+	/// Folder; empty for none.
+	std::string m_Skins;
+	VOutput m_Out;
+	std::string m_View;
+	int m_Width = 1280;
+	int m_Height = 720;
+};
+
+/// The views by name, in the order of the preview's camera types.
+inline constexpr std::array c_Views = {"perspective", "front", "back", "left", "right", "top", "bottom"};
+
+/// Draws the picture. Only this needs a display, and libraries that would make every start of the program longer: so
+/// "retarget" has another program do it, which is made of the same commands.
+using VRender = std::function<EExitStatus(const VRenderSettings&)>;
+
+} // namespace CommandLine

@@ -1,0 +1,393 @@
+#include "retarget/subject/Edits.h"
+
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Messages.h"
+#include "CommandLineText/Suggest.h"
+
+#include "CoreOrlexTypes/JointType.h"
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupDocument/RetargetTargets.h"
+#include "RetargetSetupDocument/SideOfName.h"
+#include "math/NumberText.h"
+
+#include <algorithm>
+#include <fstream>
+#include <iostream>
+#include <iterator>
+
+namespace CommandLine
+{
+namespace
+{
+
+using CoreOrlexTypes::VSubjectParametrised;
+
+/// The index of the segment on the other side, -1 if there is none.
+std::int32_t PartnerOf(
+    const VSession::VPartners& i_rPartners, const VSubjectParametrised& i_rSubject, std::size_t i_Segment)
+{
+	for (auto it = i_rPartners.rbegin(); it != i_rPartners.rend(); ++it)
+		if (it->first == i_Segment || it->second == i_Segment)
+			return std::int32_t(it->first == i_Segment ? it->second : it->first);
+	return RetargetSetup::FindMirrorSegment(i_rSubject, i_Segment);
+}
+
+void AddOneTarget(
+    VSession& io_rSession, const std::string& i_rEdit, std::size_t i_Source, std::size_t i_Target, bool i_bPosition)
+{
+	const std::size_t before = io_rSession.Target().m_Targets.size();
+	io_rSession.Document().AddTarget(int(i_Source), int(i_Target), i_bPosition, false);
+	if (io_rSession.Target().m_Targets.size() == before)
+		throw VCommandError(EBadInput, i_rEdit + ": the target could not be added");
+}
+
+void AddTarget(VSession& io_rSession, const std::string& i_rPair, bool i_bPosition)
+{
+	const std::string option = i_bPosition ? "--position" : "--rotation";
+	const VSubjectParametrised& rSource = io_rSession.Source(option);
+	const auto [source, target] =
+	    FindPair(i_rPair, SegmentsOf(rSource, "source segment"), SegmentsOf(io_rSession.Target(), "target segment"));
+	const std::string edit = option + " " + i_rPair;
+	AddOneTarget(io_rSession, edit, source, target, i_bPosition);
+	if (!io_rSession.m_bSymmetry)
+		return;
+	const std::string& rSourceName = rSource.m_Segments[source].m_Name;
+	const std::string& rTargetName = io_rSession.Target().m_Segments[target].m_Name;
+	const std::int32_t sourcePartner = PartnerOf(io_rSession.m_SourcePartners, rSource, source);
+	const std::int32_t targetPartner = PartnerOf(io_rSession.m_TargetPartners, io_rSession.Target(), target);
+	if (sourcePartner != -1 && targetPartner != -1)
+		return AddOneTarget(io_rSession, edit, std::size_t(sourcePartner), std::size_t(targetPartner), i_bPosition);
+	const auto hasSide = [](const std::string& i_rName)
+	{ return RetargetSetup::SideOfName(i_rName) != RetargetSetup::ESide::None; };
+	const std::string sentence = edit + ": " + (sourcePartner == -1 ? "the source segment \"" + rSourceName + "\"" : "")
+	    + (sourcePartner == -1 && targetPartner == -1 ? " and " : "")
+	    + (targetPartner == -1 ? "the target segment \"" + rTargetName + "\"" : "")
+	    + " has no partner on the other side";
+	if (hasSide(rSourceName) && hasSide(rTargetName))
+		io_rSession.m_WithoutPartner.push_back(sentence);
+	else
+		NVX_LOG(c_pCategory, NVX::ELogInformation, "%1%: the target is added alone", sentence);
+}
+
+void AddPosition(VSession& io_rSession, const std::string& i_rPair)
+{
+	AddTarget(io_rSession, i_rPair, true);
+}
+
+void AddRotation(VSession& io_rSession, const std::string& i_rPair)
+{
+	AddTarget(io_rSession, i_rPair, false);
+}
+
+void SymmetryOn(VSession& io_rSession, const std::string&)
+{
+	io_rSession.m_bSymmetry = true;
+}
+
+void SymmetryOff(VSession& io_rSession, const std::string&)
+{
+	io_rSession.m_bSymmetry = false;
+}
+
+void Pair(VSession& io_rSession, const std::string& i_rPair)
+{
+	if (i_rPair.starts_with('#') || i_rPair.find(":#") != std::string::npos)
+		throw VCommandError(EWrongUsage,
+		    "--pair " + i_rPair + ": segments are given by name, since an index means one of each skeleton");
+	const auto add = [&](const VSubjectParametrised& i_rSubject, const char* i_pKind, VSession::VPartners& io_rPartners)
+	{
+		const VElements segments = SegmentsOf(i_rSubject, i_pKind);
+		io_rPartners.push_back(FindPair(i_rPair, segments, segments));
+	};
+	bool bOfSource = false;
+	if (const auto pSource = io_rSession.Document().SourceValues().m_pParametrised)
+	{
+		try
+		{
+			add(*pSource, "source segment", io_rSession.m_SourcePartners);
+			bOfSource = true;
+		}
+		catch (const VCommandError&)
+		{
+			// Then they are the target's, or it tells what is wrong.
+		}
+	}
+	try
+	{
+		add(io_rSession.Target(), "target segment", io_rSession.m_TargetPartners);
+	}
+	catch (const VCommandError&)
+	{
+		if (!bOfSource)
+			throw;
+	}
+}
+
+void AllowPartial(VSession& io_rSession, const std::string&)
+{
+	io_rSession.m_bAllowPartial = true;
+}
+
+void RemoveTarget(VSession& io_rSession, const std::string& i_rIndex)
+{
+	io_rSession.Document().RemoveTarget(int(ParseIndex(i_rIndex, "target", io_rSession.Target().m_Targets.size())));
+}
+
+void SetWeight(VSession& io_rSession, const std::string& i_rValue)
+{
+	const auto [index, weight] = SplitAssignment(i_rValue, "TARGET=WEIGHT");
+	VSubjectParametrised subject = io_rSession.Target();
+	auto& rTarget = subject.m_Targets[ParseIndex(index, "target", subject.m_Targets.size())];
+	rTarget.m_Weight = ParseFinite(weight, "--weight");
+	if (rTarget.m_Weight < 0.0)
+		throw VCommandError(EWrongUsage, "--weight: a weight cannot be negative: " + weight);
+	io_rSession.Document().SetTargetSubjectParametrised(subject);
+}
+
+void SetState(VSession& io_rSession, const std::string& i_rValue)
+{
+	const auto [word, list] = SplitAssignment(i_rValue, "TARGET=X,Y,Z");
+	VSubjectParametrised subject = io_rSession.Target();
+	const std::size_t index = ParseIndex(word, "target", subject.m_Targets.size());
+	const std::vector<double> values = ParseList(list, "--state");
+	if (values.size() != 3)
+		throw VCommandError(EWrongUsage, "--state: \"" + list + "\" is not three numbers");
+	for (std::size_t i = 0; i < 3; ++i)
+		if (!RetargetSetup::SetStateExpression(subject, NumberText::PrintG17(values[i]), index, i))
+			throw VCommandError(
+			    EWrongUsage, "--state: target #" + std::to_string(index) + " cannot take \"" + list + "\"");
+	io_rSession.Document().SetTargetSubjectParametrised(subject);
+}
+
+void SetScale(VSession& io_rSession, const std::string& i_rValue)
+{
+	const double scale = ParseFinite(i_rValue, "--scale");
+	if (!(scale > 0.0))
+		throw VCommandError(EWrongUsage, "--scale: a scale must be above 0: " + i_rValue);
+	io_rSession.Document().SetTargetScale(scale);
+	if (io_rSession.Document().GetTargetScale() != scale)
+		throw VCommandError(EWrongUsage, "--scale: the target subject takes no other scale");
+}
+
+void CreateJoints(VSession& io_rSession, const std::string&)
+{
+	io_rSession.Document().CreateAllJoints();
+}
+
+void PruneJoints(VSession& io_rSession, const std::string&)
+{
+	if (io_rSession.m_bMatched)
+		NVX_LOG(c_pCategory, NVX::ELogWarning,
+		    "--prune-joints after --match-file-pose: pruning moves what was matched; put --match-file-pose behind it");
+	io_rSession.Document().RemoveUnnecessaryJoints();
+}
+
+void Pose(VSession& io_rSession, const std::string& i_rValue)
+{
+	const auto [word, list] = SplitAssignment(i_rValue, "SEGMENT=rx,ry,rz[,tx,ty,tz]");
+	VSubjectParametrised subject = io_rSession.Target();
+	const std::size_t index = FindElement(word, SegmentsOf(subject, "target segment"));
+	auto& rJoint = subject.m_Segments[index].m_Joint;
+	const std::size_t size = CoreOrlexTypes::StateSize(rJoint.m_JointType);
+	const std::vector<double> values = ParseList(list, "--pose");
+	if (size == 0)
+		throw VCommandError(EWrongUsage,
+		    "--pose: \"" + subject.m_Segments[index].m_Name
+		        + "\" has no joint that could move; --create-joints before it gives it one");
+	if (values.size() != std::min<std::size_t>(size, 3) && values.size() != size)
+		throw VCommandError(EWrongUsage,
+		    "--pose: the joint of \"" + subject.m_Segments[index].m_Name + "\" takes " + (size > 3 ? "3 or " : "")
+		        + std::to_string(size) + " numbers, not " + std::to_string(values.size()));
+	// A rotation alone leaves the root where it is.
+	rJoint.m_BindPose.resize(size);
+	std::copy(values.begin(), values.end(), rJoint.m_BindPose.begin());
+	rJoint.m_Mean = rJoint.m_BindPose;
+	io_rSession.Document().SetTargetSubjectParametrised(subject);
+}
+
+/// What was told of a pose that is now the file's.
+void ForgetPoseWarnings()
+{
+	ForgetMessages(
+	    [](const std::string& i_rCategory, const std::string& i_rText)
+	    {
+		    for (const auto& [pCategory, pBegin] :
+		        {std::pair{"RetargetSetup", "Root bone '"}, {"RetargetSetup", "Removing joints changed the bind pose"},
+		            {c_pCategory, "The bind pose as built differs"}, {c_pCategory, "--prune-joints after"}})
+			    if (i_rCategory == pCategory && i_rText.starts_with(pBegin))
+				    return true;
+		    return false;
+	    });
+}
+
+void MatchFilePose(VSession& io_rSession, const std::string&)
+{
+	io_rSession.Document().MatchFilePose();
+	io_rSession.m_bMatched = true;
+	ForgetPoseWarnings();
+}
+
+void UpdateTargets(VSession& io_rSession, const std::string&)
+{
+	io_rSession.Source("--update-targets");
+	io_rSession.Document().UpdateTargets();
+}
+
+constexpr const char* c_pEditsGroup = "Edits, run in the order given";
+
+constexpr VEditKind c_Kinds[] = {
+    {"--position", "SRC:TGT",
+        "Add a position target: a point fixed to the target segment TGT follows the source segment SRC. Segments are "
+        "given by name, without a namespace, or as #index",
+        AddPosition},
+    {"--rotation", "SRC:TGT",
+        "Add a rotation target: the orientation of the target segment TGT follows the source segment SRC", AddRotation},
+    {"--symmetry", nullptr, "From here on, a target that is added gets its left or right partner too", SymmetryOn},
+    {"--no-symmetry", nullptr, "From here on, a target is added alone (the default)", SymmetryOff},
+    {"--pair", "LEFT:RIGHT",
+        "From here on, the segments LEFT and RIGHT are each other's partner, whatever their names say: of the source, "
+        "of "
+        "the target, or of both where both have them",
+        Pair},
+    {"--allow-partial", nullptr,
+        "Let a target of one side, wherever it stands, go without a partner where none is found; without this it is an "
+        "error (exit status 1)",
+        AllowPartial},
+    {"--remove-target", "N", "Remove target N; those behind it move up by one", RemoveTarget},
+    {"--weight", "N=W", "Give target N the weight W", SetWeight},
+    {"--state", "N=X,Y,Z",
+        "Give target N the offset X,Y,Z: mm at the present scale (position) or an angle-axis in radians (rotation)",
+        SetState},
+    {"--scale", "S", "Scale all lengths of the target subject: 1 is the size in the file", SetScale},
+    {"--create-joints", nullptr, "Give every segment without a joint a ball joint", CreateJoints},
+    {"--prune-joints", nullptr, "Remove the joints of segments that carry no target", PruneJoints},
+    {"--pose", "SEG=RX,RY,RZ[,TX,TY,TZ]",
+        "Set the bind pose of the target segment SEG: an angle-axis in radians, for the root a translation in mm too",
+        Pose},
+    {"--match-file-pose", nullptr,
+        "Set all bind poses so that the segments stand as the bones do in the FBX file; belongs after --prune-joints",
+        MatchFilePose, true},
+    {"--update-targets", nullptr, "Measure the offset of every target again in the present bind poses", UpdateTargets},
+};
+
+std::string Trimmed(const std::string& i_rText)
+{
+	constexpr const char* c_Blanks = " \t\r";
+	const std::size_t begin = i_rText.find_first_not_of(c_Blanks);
+	return begin == std::string::npos ? "" : i_rText.substr(begin, i_rText.find_last_not_of(c_Blanks) + 1 - begin);
+}
+
+/// One edit a line, as on the command line but without quotes: what stands behind the option's name is its value,
+/// blanks and all. Empty lines and those that begin with "#" are passed over.
+void ReadEdits(const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
+{
+	std::ifstream file;
+	if (i_rPath != "-")
+		file.open(i_rPath);
+	std::istream& rStream = i_rPath == "-" ? std::cin : file;
+	std::size_t number = 0;
+	for (std::string line; std::getline(rStream, line);)
+	{
+		++number;
+		line = Trimmed(line);
+		if (line.empty() || line[0] == '#')
+			continue;
+		const std::string where = i_rPath + ":" + std::to_string(number) + ": ";
+		const std::size_t split = std::min(line.find_first_of(" \t="), line.size());
+		const std::string name = line.substr(0, split);
+		const std::string value = split == line.size() ? "" : Trimmed(line.substr(split + 1));
+		const auto pKind = std::find_if(std::begin(c_Kinds), std::end(c_Kinds),
+		    [&](const VEditKind& i_rKind) { return name == i_rKind.m_pName && (i_bOfCreate || !i_rKind.m_bOfCreate); });
+		if (pKind == std::end(c_Kinds))
+		{
+			std::vector<std::string> names;
+			for (const VEditKind& rKind : c_Kinds)
+				names.push_back(rKind.m_pName);
+			throw VCommandError(EBadInput, where + "there is no edit \"" + name + "\"" + Meant(name, names));
+		}
+		if (value.empty() == (pKind->m_pValue != nullptr))
+			throw VCommandError(EBadInput,
+			    where + name + (value.empty() ? std::string(" needs a value: ") + pKind->m_pValue : " takes no value"));
+		io_rEdits.push_back({pKind, value, where});
+	}
+	if (number == 0 && !rStream.eof())
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a file of edits");
+}
+
+} // namespace
+
+void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits, bool i_bOfCreate)
+{
+	for (const VEditKind& rKind : c_Kinds)
+	{
+		if (rKind.m_bOfCreate && !i_bOfCreate)
+			continue;
+		CLI::Option* pOption = nullptr;
+		if (rKind.m_pValue)
+			pOption = io_rApp
+			              .add_option_function<std::string>(
+			                  rKind.m_pName,
+			                  [i_rpEdits, &rKind](const std::string& i_rValue) {
+				                  i_rpEdits->push_back({&rKind, i_rValue, {}});
+			                  },
+			                  rKind.m_pHelp)
+			              ->option_text(rKind.m_pValue);
+		else
+			pOption = io_rApp.add_flag_callback(
+			    rKind.m_pName,
+			    [i_rpEdits, &rKind] {
+				    i_rpEdits->push_back({&rKind, {}, {}});
+			    },
+			    rKind.m_pHelp);
+		// While parsing, so that options of different names keep their order.
+		pOption->trigger_on_parse()->group(c_pEditsGroup);
+	}
+	io_rApp
+	    .add_option_function<std::string>(
+	        "--edits",
+	        [i_rpEdits, i_bOfCreate](const std::string& i_rPath) { ReadEdits(i_rPath, i_bOfCreate, *i_rpEdits); },
+	        "Here come the edits of a file: one a line, as --position Hips:Left Hip, without quotes; lines that begin "
+	        "with "
+	        "# are comments; - is standard input")
+	    ->option_text("FILE")
+	    ->trigger_on_parse()
+	    ->group(c_pEditsGroup);
+}
+
+void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord)
+{
+	io_rApp
+	    .add_option("--root-height", o_rWord,
+	        "What the scale does to the height of the root above the floor: keep leaves it, scale scales it, too, so "
+	        "that "
+	        "the feet stay on the floor")
+	    ->option_text("keep|scale")
+	    ->check(CLI::IsMember({"keep", c_pScaleRootHeight}));
+}
+
+void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
+{
+	for (const VEdit& rEdit : i_rEdits)
+	{
+		try
+		{
+			rEdit.m_pKind->m_pApply(io_rSession, rEdit.m_Value);
+		}
+		catch (const VCommandError& rError)
+		{
+			throw VCommandError(rError.Status(), rEdit.m_Where + rError.what());
+		}
+		io_rSession.Settle();
+	}
+	const std::vector<std::string>& rWithoutPartner = io_rSession.m_WithoutPartner;
+	const bool bPartial = io_rSession.m_bAllowPartial;
+	for (const std::string& rSentence : rWithoutPartner)
+		NVX_LOG(c_pCategory, bPartial ? NVX::ELogWarning : NVX::ELogError, "%1%", rSentence);
+	if (!rWithoutPartner.empty() && !bPartial)
+		throw VCommandError(EFindings,
+		    "--symmetry found no partner for " + std::to_string(rWithoutPartner.size())
+		        + " of the targets: give it with --pair LEFT:RIGHT, add those with --no-symmetry, or go without with "
+		          "--allow-partial");
+}
+
+} // namespace CommandLine

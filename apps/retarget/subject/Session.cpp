@@ -1,0 +1,153 @@
+#include "retarget/subject/Session.h"
+
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/subject/SubjectFile.h"
+#include "retarget/text/Output.h"
+
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "CoreOrlexQRTIO/Writer.h"
+#include "DebugServices/GlobalLog.h"
+#include "FBXIO/FBXReader.h"
+#include "InMemoryHost/Flow.h"
+#include "NVX/Status.h"
+#include "RetargetSetupDocument/BindPose.h"
+#include "RetargetSetupDocument/TargetConstruction.h"
+
+#include <boost/filesystem/operations.hpp>
+
+#include <algorithm>
+
+namespace CommandLine
+{
+namespace
+{
+
+std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_rSkeleton)
+{
+	VElements bones{"bone", {}};
+	for (const FBXIO::VSkinBone& rBone : i_rSkeleton)
+		bones.m_Names.push_back(rBone.m_Name);
+	// The name comes first: a bone may be called by a number.
+	if (std::find(bones.m_Names.begin(), bones.m_Names.end(), i_rWord) != bones.m_Names.end()
+	    || i_rWord.starts_with('#'))
+		return FindElement(i_rWord, bones);
+	if (!i_rWord.empty() && i_rWord.find_first_not_of("0123456789") == std::string::npos)
+		return FindElement("#" + i_rWord, bones);
+	// Or as the segment will be called, without the namespace.
+	for (std::string& rName : bones.m_Names)
+		rName = RetargetSetup::StripNamespace(rName);
+	return FindElement(i_rWord, bones);
+}
+
+} // namespace
+
+VSession::VSession()
+    : m_pApplication(std::make_shared<InMemoryHost::VApplication>()),
+      m_pDispatcher(std::make_shared<InMemoryHost::VDispatcher>()),
+      m_pDocument(std::make_shared<VRetargetSetup>(m_pDispatcher,
+          NVX::CountedPointer<TesselPluginInterface::IFrameFactory>(new InMemoryHost::VFrameFactory),
+          NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)))
+{
+	m_pApplication->m_Rules.m_bNamespacesAreDetails = true;
+	m_pDocument->SetHostRules(m_pApplication);
+}
+
+void VSession::LoadSource(const std::string& i_rPath)
+{
+	if (!m_pDocument->LoadSourceSubject(i_rPath, ""))
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a source skeleton");
+	Settle();
+	const auto pData = m_pDocument->TargetValues().m_pApplicationData;
+	if (pData && !pData->m_RetargetSourceTemplate.empty()
+	    && pData->m_RetargetSourceTemplate != m_pDocument->GetSourceName())
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "The retarget subject was made for the source \"%1%\", not for \"%2%\"",
+		    pData->m_RetargetSourceTemplate, m_pDocument->GetSourceName());
+}
+
+void VSession::LoadTarget(const std::string& i_rPath)
+{
+	const std::uint32_t status = m_pDocument->LoadTargetSubject(i_rPath);
+	if (status == NVX::Status::c_NewerFileVersion)
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" is of a later version than this program reads");
+	if (status == NVX::Status::c_FileNotOpened)
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be opened");
+	if (status != NVX::Status::c_Success)
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a retarget subject");
+	Settle();
+}
+
+void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot)
+{
+	if (!m_pDocument->LoadTargetFBX(i_rPath))
+		throw VCommandError(EBadInput,
+		    m_pDocument->IsTargetFBXComplete() ? "\"" + i_rPath + "\" could not be read as FBX, or holds no skeleton"
+		                                       : "\"" + i_rPath + "\" could be read only in part");
+	const auto pSkeleton = m_pDocument->GetFBXSkeleton();
+	if (!m_pDocument->IsTargetFBXComplete())
+		throw VCommandError(EBadInput,
+		    "\"" + i_rPath + "\" could be read only in part: " + std::to_string(pSkeleton->size())
+		        + " bones up to where it broke off");
+	if (i_rRoot)
+		m_pDocument->SetTargetRootIndex(std::uint32_t(FindRoot(*i_rRoot, *pSkeleton)));
+	m_pDocument->CreateTargetSubject();
+	Settle();
+}
+
+void VSession::Report(const std::string& i_rPath) const
+{
+	const CoreOrlexTypes::VSubjectParametrised& rSubject = Target();
+	const auto joints = std::ranges::count_if(rSubject.m_Segments,
+	    [](const auto& i_rSegment)
+	    { return i_rSegment.m_Joint.m_JointType != CoreOrlexTypes::VSubjectParametrised::VJoint::EDummy; });
+	PrintResult({{"output", i_rPath}, {"segments", rSubject.m_Segments.size()}, {"joints", joints},
+	                {"targets", rSubject.m_Targets.size()}},
+	    "");
+}
+
+void VSession::Save(const std::string& i_rPath)
+{
+	if (StrictAsked() && i_rPath != "-")
+	{
+		// What saving would warn of is known only from a save.
+		boost::system::error_code error;
+		const boost::filesystem::path trial = boost::filesystem::temp_directory_path(error)
+		    / boost::filesystem::unique_path("retarget-%%%%%%%%%%%%.qrr", error);
+		m_pDocument->SaveTargetSubject(trial);
+		boost::filesystem::remove(trial, error);
+	}
+	RequireNoWarnings();
+	if (i_rPath == "-")
+	{
+		const auto values = m_pDocument->TargetValues();
+		WriteSubjectFile(i_rPath, *values.m_pParametrised, *values.m_pApplicationData, m_pDocument->GetTargetExtras(),
+		    CoreOrlexQRTIO::c_AutomaticVersion);
+		return;
+	}
+	if (m_pDocument->SaveTargetSubject(i_rPath) != NVX::Status::c_Success)
+		throw VCommandError(EBadOutput, "\"" + i_rPath + "\" could not be written");
+	NVX_LOG(c_pCategory, NVX::ELogInformation, "Saved \"%1%\": %2% segments, %3% targets", i_rPath,
+	    Target().m_Segments.size(), Target().m_Targets.size());
+}
+
+const CoreOrlexTypes::VSubjectParametrised& VSession::Source(const std::string& i_rWhatFor) const
+{
+	const auto pSource = m_pDocument->SourceValues().m_pParametrised;
+	if (!pSource)
+		throw VCommandError(
+		    EWrongUsage, i_rWhatFor + " needs the performer's skeleton: give it with --source FILE.qrs");
+	return *pSource;
+}
+
+const CoreOrlexTypes::VSubjectParametrised& VSession::Target() const
+{
+	return *m_pDocument->TargetValues().m_pParametrised;
+}
+
+std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectValues& i_rValues, const char* i_pWhich)
+{
+	const auto pFK = RetargetSetup::KinematicsInBindPose(*i_rValues.m_pParametrised, *i_rValues.m_pSubject, i_pWhich);
+	return pFK ? RetargetSetup::SegmentPoses(*pFK) : std::vector<Rotation::VPose<double>>();
+}
+
+} // namespace CommandLine

@@ -1,0 +1,75 @@
+#pragma once
+
+#include "retarget/subject/Elements.h"
+
+#include "InMemoryHost/Application.h"
+#include "InMemoryHost/Dispatcher.h"
+#include "RetargetSetupDocument/RetargetSetup.h"
+#include "numerics/Rotation.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace CommandLine
+{
+
+/// The document with host services in memory. Operations throw VCommandError to fail.
+class VSession
+{
+public:
+	VSession();
+
+	/// EBadInput if the file cannot be read. Tells if the target subject was made for another source.
+	void LoadSource(const std::string& i_rPath);
+	void LoadTarget(const std::string& i_rPath);
+
+	/// Reads the FBX file and makes the target subject of it, from the root bone of this name or index on; without one
+	/// the choice is the document's. EWrongUsage for a root that the file does not have.
+	void CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot);
+
+	/// EBadOutput if the file could not be written; the one that stood there then stays. "-" is standard output.
+	/// EFindings with --strict, and nothing written, if there has been a warning or saving would bring one.
+	void Save(const std::string& i_rPath);
+
+	/// What the document asks its host for.
+	TesselPluginInterface::VHostRules& Rules() { return m_pApplication->m_Rules; }
+	/// With --json: where the subject was saved and what it holds.
+	void Report(const std::string& i_rPath) const;
+
+	VRetargetSetup& Document() { return *m_pDocument; }
+	const std::shared_ptr<VRetargetSetup>& SharedDocument() const { return m_pDocument; }
+	const std::shared_ptr<InMemoryHost::VDispatcher>& Dispatcher() const { return m_pDispatcher; }
+
+	/// Runs what the document has posted.
+	void Settle() { m_pDispatcher->RunPending(); }
+
+	/// EWrongUsage, with what the source is needed for, if there is none.
+	const CoreOrlexTypes::VSubjectParametrised& Source(const std::string& i_rWhatFor) const;
+	const CoreOrlexTypes::VSubjectParametrised& Target() const;
+
+	/// Whether targets that are added get a mirrored partner; off at first, as in the panel.
+	bool m_bSymmetry = false;
+	/// Segments that are each other's partner whatever their names say, by index; the last one counts.
+	using VPartners = std::vector<std::pair<std::size_t, std::size_t>>;
+	VPartners m_SourcePartners;
+	VPartners m_TargetPartners;
+	/// One sentence for each target of a side that should have got a partner and did not.
+	std::vector<std::string> m_WithoutPartner;
+	bool m_bAllowPartial = false;
+	/// The bind poses have been taken from the file.
+	bool m_bMatched = false;
+
+private:
+	std::shared_ptr<InMemoryHost::VApplication> m_pApplication;
+	std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher;
+	std::shared_ptr<VRetargetSetup> m_pDocument;
+};
+
+/// World poses of all segments of a subject in its bind pose, in mm; empty, which is told, if it has no
+/// kinematics.
+std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectValues& i_rValues, const char* i_pWhich);
+
+} // namespace CommandLine

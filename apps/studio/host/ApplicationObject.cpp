@@ -1,0 +1,33 @@
+#include "studio/host/ApplicationObject.h"
+
+#include "studio/host/Preferences.h"
+
+namespace StudioHost
+{
+
+VApplicationObject::VApplicationObject(std::shared_ptr<const VPreferences> i_pPreferences)
+    : m_pPreferences(std::move(i_pPreferences))
+{
+}
+
+TesselPluginInterface::VHostRules VApplicationObject::Rules() const
+{
+	TesselPluginInterface::VHostRules rules;
+	rules.m_bNamespacesAreDetails = true;
+	rules.m_bEachPairOnce = true;
+	rules.m_bPoseFromFile = m_pPreferences->Number(c_pPoseFromFileKey, 1) != 0;
+	rules.m_bMirrorChange = true;
+	return rules;
+}
+
+bool VApplicationObject::MayReplaceTargetSubject(const std::string& i_rAction)
+{
+	return !m_AskToReplace || m_AskToReplace(i_rAction);
+}
+
+bool VApplicationObject::MayOverwriteChangedFile(const std::string& i_rPath)
+{
+	return !m_AskToOverwrite || m_AskToOverwrite(i_rPath);
+}
+
+} // namespace StudioHost

@@ -1,0 +1,290 @@
+#include "studio/panel/RetargetPanel.h"
+
+#include "DebugServices/GlobalLog.h"
+#include "NVX/IQuickWidget.h"
+#include "TesselDataStore/StoredValue.h"
+#include "TesselPluginInterface/IParameter.h"
+#include "TesselPluginInterface/IParameterGroup.h"
+#include "TesselPluginInterface/IParameterRegistry.h"
+#include "studio/panel/FileKind.h"
+
+#include <QAbstractItemModel>
+#include <QFileInfo>
+#include <QQmlComponent>
+#include <QQuickItem>
+#include <QQuickWidget>
+#include <QQuickWindow>
+#include <QRegularExpression>
+
+#include <algorithm>
+#include <utility>
+
+namespace StudioHost
+{
+namespace
+{
+
+constexpr const char* c_pDocument = "ContextRetargetSetup";
+constexpr const char* c_pParameterPath = "RetargetSetup";
+constexpr const char* c_pParameterGroup = "Subject";
+constexpr const char* c_pCurrentFile = "currentTargetSubjectURL";
+constexpr const char* c_pSource = "SourceSkeleton";
+constexpr const char* c_pFbx = "TargetFBX";
+
+/// What the operator pressed, by the document's command.
+constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubject", "Create Target Subject"},
+    {"LoadTargetSubjectURL", "Load"}, {"SaveTargetSubjectURL", "Save"}, {"AddTarget", "Add target"},
+    {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"},
+    {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"MatchFilePose", "Take pose from FBX"},
+    {"UpdateTargets", "Update targets"}};
+
+/// By objectName, of what can be seen.
+const QQuickItem* ItemNamed(const QQuickItem& i_rItem, const QString& i_rName)
+{
+	if (!i_rItem.isVisible())
+		return nullptr;
+	if (i_rItem.objectName() == i_rName)
+		return &i_rItem;
+	for (const QQuickItem* pChild : i_rItem.childItems())
+		if (const QQuickItem* const pFound = ItemNamed(*pChild, i_rName))
+			return pFound;
+	return nullptr;
+}
+
+} // namespace
+
+std::unique_ptr<VRetargetPanel> VRetargetPanel::Find(
+    QWidget& i_rPanel, std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters)
+{
+	auto* const pQuick = qobject_cast<NVX::IQuickWidget*>(&i_rPanel);
+	QObject* const pDocument = pQuick ? pQuick->contextProperty(QLatin1String(c_pDocument)).value<QObject*>() : nullptr;
+	if (!pDocument)
+		return nullptr;
+	return std::unique_ptr<VRetargetPanel>(new VRetargetPanel(i_rPanel, *pDocument, std::move(i_pParameters)));
+}
+
+VRetargetPanel::VRetargetPanel(
+    QWidget& i_rPanel, QObject& i_rDocument, std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters)
+    : m_pWidget(&i_rPanel), m_pDocument(&i_rDocument), m_pParameters(std::move(i_pParameters))
+{
+	connect(m_pDocument, SIGNAL(commandIgnored(QString, QString)), this, SLOT(TellIgnored(QString, QString)));
+	connect(m_pDocument, SIGNAL(targetSubjectLoaded(QUrl)), this, SLOT(TellUsed(QUrl)));
+	connect(m_pDocument, SIGNAL(targetSubjectSaved(QUrl)), this, SLOT(TellUsed(QUrl)));
+	connect(m_pDocument, SIGNAL(unsavedChangesChanged()), this, SIGNAL(stateChanged()));
+	if (auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data()))
+		connect(pQuickWidget, &QQuickWidget::statusChanged, this, &VRetargetPanel::FollowRootItem);
+	FollowRootItem();
+}
+
+bool VRetargetPanel::IsReady() const
+{
+	return m_pRoot;
+}
+
+void VRetargetPanel::FollowRootItem()
+{
+	const auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data());
+	QObject* const pRoot = pQuickWidget ? pQuickWidget->rootObject() : nullptr;
+	if (!pRoot || pRoot == m_pRoot)
+		return;
+	m_pRoot = pRoot;
+	if (pRoot->metaObject()->indexOfProperty(c_pCurrentFile) >= 0)
+		connect(pRoot, SIGNAL(currentTargetSubjectURLChanged()), this, SIGNAL(stateChanged()));
+	emit ready();
+}
+
+bool VRetargetPanel::Open(const QString& i_rPath)
+{
+	const QFileInfo file(i_rPath);
+	const QString path = file.absoluteFilePath();
+	const EFileKind kind = KindOf(path);
+	if (kind == EFileKind::EOther)
+	{
+		NVX_LOG("Import", NVX::ELogError, "%1% is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx",
+		    path.toStdString());
+		return false;
+	}
+	if (!file.isFile() || !file.isReadable())
+	{
+		NVX_LOG("Import", NVX::ELogError, "%1% %2%", path.toStdString(),
+		    file.exists() ? "is no file that can be read" : "does not exist");
+		return false;
+	}
+	switch (kind)
+	{
+	case EFileKind::ESource: return SetParameter(c_pSource, path);
+	case EFileKind::EFbx: return SetParameter(c_pFbx, path);
+	default:
+		ApplyTyped();
+		return QMetaObject::invokeMethod(
+		    m_pDocument, "LoadTargetSubjectURL", Qt::DirectConnection, Q_ARG(QUrl, QUrl::fromLocalFile(path)));
+	}
+}
+
+QRectF VRetargetPanel::PlaceOf(EFileKind i_Kind) const
+{
+	const char* const pName = i_Kind == EFileKind::ESource ? c_pSource
+	    : i_Kind == EFileKind::EFbx                        ? c_pFbx
+	    : i_Kind == EFileKind::ETarget                     ? "currentFile"
+	                                                       : nullptr;
+	const auto* const pRoot = qobject_cast<const QQuickItem*>(m_pRoot.data());
+	const QQuickItem* const pItem = pRoot && pName ? ItemNamed(*pRoot, QLatin1String(pName)) : nullptr;
+	return pItem ? pItem->mapRectToScene(pItem->boundingRect()) : QRectF();
+}
+
+void VRetargetPanel::MarkDrop(const QStringList& i_rPaths)
+{
+	m_pDropMark.reset();
+	auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data());
+	if (i_rPaths.isEmpty() || !pQuickWidget || !m_pRoot)
+		return;
+	QStringList lines;
+	QVariantList places;
+	for (const QString& rPath : i_rPaths)
+	{
+		const EFileKind kind = KindOf(rPath);
+		const QString name = QFileInfo(rPath).fileName();
+		lines << (kind == EFileKind::EOther ? tr("%1 cannot be opened").arg(name)
+		                                    : tr("%1 opens as the %2").arg(name, KindName(kind)));
+		if (const QRectF place = PlaceOf(kind); !place.isEmpty())
+			places << place;
+	}
+	// The panel lies over all widgets of the window, so what lies over the panel is part of its scene.
+	QQmlComponent component(pQuickWidget->engine(), QStringLiteral("qrc:/qml/Orlex/Controls/DropMark.qml"),
+	    QQmlComponent::PreferSynchronous);
+	m_pDropMark.reset(component.createWithInitialProperties(
+	    {{"parent", QVariant::fromValue(pQuickWidget->quickWindow()->contentItem())}, {"text", lines.join('\n')},
+	        {"places", places}}));
+}
+
+bool VRetargetPanel::SetParameter(const char* i_pName, const QString& i_rPath)
+{
+	const auto pGroup = m_pParameters->Find(c_pParameterPath, c_pParameterGroup);
+	const auto pParameter = pGroup ? pGroup->Find(i_pName) : nullptr;
+	if (!pParameter)
+	{
+		NVX_LOG("Import", NVX::ELogError, "%1% cannot be opened: the panel has no parameter %2%", i_rPath.toStdString(),
+		    i_pName);
+		return false;
+	}
+	// The panel offers a file from outside its folders by itself.
+	pParameter->SetValue(TesselDataStore::ToVariant(i_rPath.toStdString()));
+	emit fileUsed(i_rPath);
+	return true;
+}
+
+const QAbstractItemModel* VRetargetPanel::Model(const char* i_pName) const
+{
+	const auto* const pPanel = qobject_cast<NVX::IQuickWidget*>(m_pWidget.data());
+	return pPanel ? qobject_cast<QAbstractItemModel*>(pPanel->contextProperty(QLatin1String(i_pName)).value<QObject*>())
+	              : nullptr;
+}
+
+QString VRetargetPanel::CurrentFile() const
+{
+	return m_pRoot ? m_pRoot->property(c_pCurrentFile).toUrl().toLocalFile() : QString();
+}
+
+bool VRetargetPanel::IsCurrentFileReadOnly() const
+{
+	return CurrentFile().endsWith(QStringLiteral(".qrx"));
+}
+
+QString VRetargetPanel::WhyNotSave() const
+{
+	const QAbstractItemModel* const pSegments = Model("TargetSegmentModel");
+	return pSegments && pSegments->rowCount() > 0 ? QString() : tr("there is no target subject yet");
+}
+
+void VRetargetPanel::New()
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(m_pDocument, "NewTargetSubject");
+}
+
+void VRetargetPanel::SaveAs()
+{
+	QObject* const pDialog = m_pRoot ? m_pRoot->findChild<QObject*>(QStringLiteral("saveDialog")) : nullptr;
+	if (!WhyNotSave().isEmpty())
+		TellIgnored(QStringLiteral("SaveTargetSubjectURL"), tr("There is no target subject yet."));
+	else if (pDialog)
+		QMetaObject::invokeMethod(pDialog, "open");
+}
+
+void VRetargetPanel::Save()
+{
+	// Without a file the panel asks for one.
+	if (!CurrentFile().isEmpty())
+		QMetaObject::invokeMethod(m_pRoot, "save");
+	else
+		SaveAs();
+}
+
+void VRetargetPanel::SaveTo(const QString& i_rPath)
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(
+	    m_pDocument, "SaveTargetSubjectURL", Qt::DirectConnection, Q_ARG(QUrl, QUrl::fromLocalFile(i_rPath)));
+}
+
+void VRetargetPanel::ApplyTyped()
+{
+	if (m_pRoot)
+		QMetaObject::invokeMethod(m_pRoot, "commitEdits");
+}
+
+bool VRetargetPanel::HasUnsavedChanges() const
+{
+	bool bUnsaved = false;
+	QMetaObject::invokeMethod(m_pDocument, "HasUnsavedChanges", Qt::DirectConnection, Q_RETURN_ARG(bool, bUnsaved));
+	return bUnsaved;
+}
+
+std::vector<NVX::ISelectionItem> VRetargetPanel::ItemsNamedIn(const QString& i_rMessage) const
+{
+	// Names stand in quotes, targets by their number.
+	static const QRegularExpression s_Name(QStringLiteral("'([^']+)'|\"([^\"]+)\""));
+	static const QRegularExpression s_Target(QStringLiteral("\\b[Tt]arget #?(\\d+)"));
+	QStringList names;
+	for (auto match = s_Name.globalMatch(i_rMessage); match.hasNext();)
+		names << match.next().capturedTexts().last();
+	const QRegularExpressionMatch target = s_Target.match(i_rMessage);
+
+	std::vector<NVX::ISelectionItem> items;
+	const auto take = [&](const char* i_pModel, const auto& i_IsNamed)
+	{
+		const QAbstractItemModel* const pModel = Model(i_pModel);
+		if (!pModel)
+			return;
+		const QHash<int, QByteArray> roles = pModel->roleNames();
+		for (int row = 0; row < pModel->rowCount(); ++row)
+		{
+			const QModelIndex index = pModel->index(row, 0);
+			if (i_IsNamed(row, index.data(roles.key("name")).toString()))
+				items.push_back(index.data(roles.key("selectionItem")).value<NVX::ISelectionItem>());
+		}
+	};
+	const auto isSegment = [&](int, const QString& i_rName) { return names.contains(i_rName); };
+	take("SourceSegmentModel", isSegment);
+	take("TargetSegmentModel", isSegment);
+	if (target.hasMatch())
+		take("TargetModel", [&](int i_Row, const QString&) { return i_Row == target.captured(1).toInt(); });
+	return items;
+}
+
+void VRetargetPanel::TellIgnored(const QString& i_rCommand, const QString& i_rReason)
+{
+	const auto found =
+	    std::ranges::find(c_Buttons, i_rCommand, [](const auto& i_rRow) { return QString(i_rRow.first); });
+	const QString name = found == std::end(c_Buttons) ? i_rCommand : found->second;
+	NVX_LOG("Command", NVX::ELogWarning, "%1%: %2%", name.toStdString(), i_rReason.toStdString());
+	if (i_rCommand == QStringLiteral("SaveTargetSubjectURL"))
+		emit saveFailed(i_rReason);
+}
+
+void VRetargetPanel::TellUsed(const QUrl& i_rUrl)
+{
+	emit fileUsed(i_rUrl.toLocalFile());
+}
+
+} // namespace StudioHost

@@ -1,0 +1,299 @@
+#include "studio/window/StudioWindow.h"
+
+#include "TesselPluginInterface/IPreferenceFolders.h"
+#include "TesselPluginInterface/PathTypes.h"
+#include "UtilsFileSystem/Paths.h"
+#include "studio/host/Preferences.h"
+#include "studio/host/Services.h"
+#include "studio/panel/FileKind.h"
+#include "studio/panel/RecentFiles.h"
+#include "studio/panel/RetargetPanel.h"
+#include "studio/window/Named.h"
+#include "studio/window/PreferencesDialog.h"
+
+#include <QAction>
+#include <QDialog>
+#include <QDockWidget>
+#include <QFile>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QMenu>
+#include <QMenuBar>
+#include <QMessageBox>
+#include <QTextBrowser>
+#include <QVBoxLayout>
+
+#include <tuple>
+
+static void InitialiseHelp()
+{
+	Q_INIT_RESOURCE(Help);
+}
+
+namespace StudioHost
+{
+namespace
+{
+
+struct VOpenRow
+{
+	EFileKind m_Kind;
+	const char* m_pName;
+	const char* m_pText;
+	const char* m_pShortcut;
+	TesselPluginInterface::EPathTypes m_Folder;
+};
+
+constexpr VOpenRow c_OpenRows[] = {
+    {EFileKind::ESource, "OpenSource", QT_TRANSLATE_NOOP("Studio", "Open &Source Skeleton..."), "Ctrl+Shift+O",
+        TesselPluginInterface::EPathSubjects},
+    {EFileKind::EFbx, "OpenFbx", QT_TRANSLATE_NOOP("Studio", "Open &FBX..."), "Ctrl+Shift+F",
+        TesselPluginInterface::EPathSkins},
+    {EFileKind::ETarget, "OpenTarget", QT_TRANSLATE_NOOP("Studio", "&Open Retarget Subject..."), "Ctrl+O",
+        TesselPluginInterface::EPathRetargets}};
+
+struct VCommandRow
+{
+	const char* m_pName;
+	const char* m_pText;
+	/// Separated by blanks.
+	const char* m_pShortcuts;
+	const char* m_pCommand;
+};
+
+constexpr VCommandRow c_CommandRows[] = {
+    {"FrameSelected", QT_TRANSLATE_NOOP("Studio", "&Frame Selected"), "Ctrl+F", "Workspace3d:FrameSelected"},
+    {"ScaleUpManipulator", QT_TRANSLATE_NOOP("Studio", "&Larger Manipulator"),
+        "Ctrl++ Ctrl+=", "Workspace3d:ScaleUpManipulator"},
+    {"ScaleDownManipulator", QT_TRANSLATE_NOOP("Studio", "&Smaller Manipulator"), "Ctrl+-",
+        "Workspace3d:ScaleDownManipulator"}};
+
+} // namespace
+
+QAction* VStudioWindow::AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText,
+    const QKeySequence& i_rShortcut, std::function<void()> i_Run)
+{
+	QAction* const pAction = io_rMenu.addAction(i_rText);
+	pAction->setObjectName(QLatin1String(i_pName));
+	pAction->setShortcut(i_rShortcut);
+	connect(pAction, &QAction::triggered, this, std::move(i_Run));
+	return pAction;
+}
+
+void VStudioWindow::MakeMenus(bool i_bDeveloper)
+{
+	Named(menuBar(), "MenuBar", tr("Menus"));
+	MakeFileMenu();
+	MakeViewMenu(i_bDeveloper);
+	MakeHelpMenu();
+}
+
+void VStudioWindow::MakeFileMenu()
+{
+	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&File")), "FileMenu", tr("File"));
+	const auto withPanel = [this](void (VRetargetPanel::*i_pCommand)())
+	{
+		return [this, i_pCommand]
+		{
+			if (m_pRetargetPanel)
+				(m_pRetargetPanel.get()->*i_pCommand)();
+		};
+	};
+	AddAction(rMenu, "New", tr("&New Retarget Subject"), QKeySequence::New, withPanel(&VRetargetPanel::New));
+	for (const VOpenRow& rRow : c_OpenRows)
+		AddAction(rMenu, rRow.m_pName, tr(rRow.m_pText), QKeySequence(rRow.m_pShortcut),
+		    [this, kind = int(rRow.m_Kind)] { AskAndOpen(kind); });
+	m_pRecentMenu = Named(rMenu.addMenu(tr("Open &Recent")), "RecentMenu", tr("Files used last"));
+	connect(m_pRecentFiles.get(), &VRecentFiles::changed, this, &VStudioWindow::UpdateRecentFiles);
+	UpdateRecentFiles();
+	rMenu.addSeparator();
+	// Off only while the menu shows it: the shortcut tells why nothing was saved.
+	connect(&rMenu, &QMenu::aboutToShow, this, &VStudioWindow::UpdateSaveActions);
+	connect(&rMenu, &QMenu::aboutToHide, this,
+	    [this]
+	    {
+		    for (const char* const pName : {"New", "Save", "SaveAs"})
+			    findChild<QAction*>(QLatin1String(pName))->setEnabled(true);
+	    });
+	AddAction(rMenu, "Save", tr("&Save Retarget Subject"), QKeySequence::Save, withPanel(&VRetargetPanel::Save));
+	AddAction(rMenu, "SaveAs", tr("Save Retarget Subject &As..."), QKeySequence(QStringLiteral("Ctrl+Shift+S")),
+	    withPanel(&VRetargetPanel::SaveAs));
+	rMenu.addSeparator();
+	AddAction(rMenu, "PreferencesAction", tr("&Preferences..."), QKeySequence(QStringLiteral("Ctrl+,")),
+	    [this] { ShowPreferences(); });
+	rMenu.addSeparator();
+	AddAction(rMenu, "Quit", tr("&Quit"), QKeySequence::Quit, [this] { close(); });
+}
+
+void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
+{
+	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&View")), "ViewMenu", tr("View"));
+	for (const VCommandRow& rRow : c_CommandRows)
+	{
+		QList<QKeySequence> shortcuts;
+		for (const QString& rShortcut : QString(rRow.m_pShortcuts).split(' '))
+			shortcuts << QKeySequence(rShortcut);
+		AddAction(rMenu, rRow.m_pName, tr(rRow.m_pText), {},
+		    [this, pCommand = rRow.m_pCommand] { Execute(QLatin1String(pCommand)); })
+		    ->setShortcuts(shortcuts);
+	}
+	rMenu.addSeparator();
+	m_pPanelMenu = Named(rMenu.addMenu(tr("&Panels")), "PanelMenu", tr("Panels"));
+	m_pPanelMenu->addAction(m_pLogDock->toggleViewAction());
+	if (i_bDeveloper)
+	{
+		rMenu.addSeparator();
+		AddAction(rMenu, "Reload", tr("&Reload QML"), QKeySequence(Qt::Key_F5),
+		    [this] { m_pGui->QuickEngine().ReloadSignal().Fire(); });
+	}
+}
+
+void VStudioWindow::MakeHelpMenu()
+{
+	InitialiseHelp();
+	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&Help")), "HelpMenu", tr("Help"));
+	AddAction(
+	    rMenu, "OperatorPage", tr("&Operator's Page"), QKeySequence::HelpContents, [this] { ShowOperatorPage(); });
+	AddAction(rMenu, "MouseAndKeys", tr("&Mouse and Keys"), QKeySequence(QStringLiteral("Shift+F1")),
+	    [this] { ShowMouseAndKeys(); });
+	AddAction(rMenu, "About", tr("&About"), {}, [this] { ShowAbout(); });
+}
+
+void VStudioWindow::AskAndOpen(int i_Kind)
+{
+	for (const VOpenRow& rRow : c_OpenRows)
+	{
+		if (int(rRow.m_Kind) != i_Kind)
+			continue;
+		const char* const pKey = TesselPluginInterface::c_FolderKeys[rRow.m_Folder];
+		const QString folder = QString::fromStdString(UtilsFileSystem::ToUtf8(m_pContext->Preferences().Folder(pKey)));
+		const QString file = QFileDialog::getOpenFileName(
+		    this, tr("Choose a file"), folder, DialogFilter(rRow.m_Kind) + QStringLiteral(";;") + tr("All files (*)"));
+		if (!file.isEmpty())
+			Open(file);
+	}
+}
+
+QString VStudioWindow::AskWhereToSave()
+{
+	const char* const pKey = TesselPluginInterface::c_FolderKeys[TesselPluginInterface::EPathRetargets];
+	QString file = QString::fromStdString(UtilsFileSystem::ToUtf8(m_pContext->Preferences().Folder(pKey)));
+	for (;;)
+	{
+		file = QFileDialog::getSaveFileName(
+		    this, tr("Choose a file"), file, tr("Subject files (*.qrr)"), nullptr, QFileDialog::DontConfirmOverwrite);
+		// A file of another extension would be none that the dialogs show.
+		if (!file.isEmpty() && KindOf(file) != EFileKind::ETarget)
+			file += QStringLiteral(".qrr");
+		if (file.isEmpty() || !QFileInfo::exists(file)
+		    || QMessageBox::warning(this, tr("Save As"),
+		           tr("%1 is there already. Do you want to replace it?").arg(QFileInfo(file).fileName()),
+		           QMessageBox::Yes | QMessageBox::No, QMessageBox::No)
+		        == QMessageBox::Yes)
+			return file;
+	}
+}
+
+void VStudioWindow::UpdateRecentFiles()
+{
+	m_pRecentMenu->clear();
+	int number = 0;
+	for (const QString& rFile : m_pRecentFiles->Files())
+	{
+		++number;
+		// A "&" in a name is no mnemonic.
+		const QString text = QStringLiteral("&%1  %2").arg(number % 10).arg(QString(rFile).replace('&', "&&"));
+		AddAction(*m_pRecentMenu, "RecentFile", text, {},
+		    [this, rFile]
+		    {
+			    if (!Open(rFile))
+				    m_pRecentFiles->Remove(rFile);
+		    });
+	}
+	m_pRecentMenu->setEnabled(number > 0);
+	if (number == 0)
+		return;
+	m_pRecentMenu->addSeparator();
+	AddAction(*m_pRecentMenu, "ClearRecentFiles", tr("&Clear"), {}, [this] { m_pRecentFiles->Clear(); });
+}
+
+void VStudioWindow::ShowMouseAndKeys()
+{
+	const bool bAltSelects = m_pContext->Preferences().Number(TesselPluginInterface::c_NavigationAltKey, 1) != 0;
+	const auto with = [](bool i_bAlt, const QString& i_rText)
+	{ return i_bAlt ? tr("Alt and %1").arg(i_rText) : i_rText; };
+	const std::pair<QString, QString> rows[] = {{with(!bAltSelects, tr("left button, dragged")), tr("turns the view")},
+	    {with(!bAltSelects, tr("left and right or middle button, dragged")), tr("moves the view")},
+	    {with(!bAltSelects, tr("right button, dragged; or the wheel")), tr("goes nearer and farther")},
+	    {tr("Ctrl+F"), tr("brings what is selected into the middle")},
+	    {tr("click"), tr("selects what is under the mouse, and nothing else")},
+	    {tr("Shift and click"), tr("adds it to what is selected")},
+	    {tr("Ctrl and click"), tr("adds it, or takes it away")}, {tr("Ctrl, Shift and click"), tr("takes it away")},
+	    {with(bAltSelects, tr("left button, dragged")), tr("selects all in a rectangle")},
+	    {tr("a ring, dragged"),
+	        tr("turns the selected target segment: with Ctrl by steps of 45 degrees, with Shift "
+	           "finely")},
+	    {tr("an arrow or a square corner, dragged"), tr("moves the root of the target subject")},
+	    {tr("Ctrl++ and Ctrl+-"), tr("make the manipulator larger and smaller")},
+	    {tr("Alt+T and Alt+R"), tr("add a position and a rotation target")}};
+	QString text = tr("<b>In the preview</b>") + QStringLiteral("<table cellpadding='3'>");
+	for (const auto& [rInput, rEffect] : rows)
+		text += QStringLiteral("<tr><td>%1</td><td>%2</td></tr>").arg(rInput.toHtmlEscaped(), rEffect.toHtmlEscaped());
+	QMessageBox box(
+	    QMessageBox::NoIcon, tr("Mouse and keys"), text + QStringLiteral("</table>"), QMessageBox::Close, this);
+	Named(&box, "MouseAndKeysBox", tr("Mouse and keys"));
+	box.exec();
+}
+
+void VStudioWindow::UpdateSaveActions()
+{
+	const QString why = m_pRetargetPanel ? m_pRetargetPanel->WhyNotSave() : tr("no panel is open");
+	const QString file = m_pRetargetPanel ? m_pRetargetPanel->CurrentFile() : QString();
+	const std::tuple<const char*, QString, QString> rows[] = {{"New", tr("&New Retarget Subject"), {}},
+	    {"Save", tr("&Save Retarget Subject"), file.isEmpty() ? tr("asks for a name") : QFileInfo(file).fileName()},
+	    {"SaveAs", tr("Save Retarget Subject &As..."), {}}};
+	for (const auto& [pName, rText, rNote] : rows)
+	{
+		auto* const pAction = findChild<QAction*>(QLatin1String(pName));
+		const QString note = why.isEmpty() ? rNote : why;
+		pAction->setText(
+		    note.isEmpty() ? rText : QStringLiteral("%1 (%2)").arg(rText, QString(note).replace('&', "&&")));
+		pAction->setEnabled(why.isEmpty());
+	}
+}
+
+void VStudioWindow::ShowOperatorPage()
+{
+	if (auto* const pShown = findChild<QDialog*>(QStringLiteral("OperatorPageWindow")))
+	{
+		pShown->raise();
+		return pShown->activateWindow();
+	}
+	// Beside the work, not instead of it.
+	auto* const pDialog = Named(new QDialog(this), "OperatorPageWindow", tr("The operator's page"));
+	pDialog->setAttribute(Qt::WA_DeleteOnClose);
+	pDialog->setWindowTitle(tr("Operator's Page"));
+	auto* const pText = Named(new QTextBrowser, "OperatorPageText", tr("The operator's page"));
+	QFile file(QStringLiteral(":/help/operator.md"));
+	if (file.open(QIODevice::ReadOnly))
+		pText->setMarkdown(QString::fromUtf8(file.readAll()));
+	auto* const pLayout = new QVBoxLayout(pDialog);
+	pLayout->setContentsMargins(0, 0, 0, 0);
+	pLayout->addWidget(pText);
+	pDialog->resize(640, 720);
+	pDialog->show();
+}
+
+void VStudioWindow::ShowAbout()
+{
+	QMessageBox box(QMessageBox::NoIcon, tr("About"),
+	    tr("<b>Retarget Studio %1</b><p>Relates a performer's skeleton to a character's, and saves the retarget "
+	       "subject "
+	       "that a real-time solver moves the character by.</p>")
+	        .arg(QStringLiteral(RETARGET_VERSION)),
+	    QMessageBox::Close, this);
+	Named(&box, "AboutBox", tr("About"));
+	box.exec();
+}
+
+} // namespace StudioHost

@@ -1,0 +1,54 @@
+#pragma once
+
+#include "OrlexGraphics/frame/FrameRenderer.h"
+#include "OrlexGraphics/item/Tracking.h"
+#include "OrlexGraphics/picking/Picking.h"
+
+#include <QQuickFramebufferObject>
+
+#include <cstdint>
+#include <optional>
+#include <vector>
+
+class QQuickWindow;
+
+namespace OrlexGraphics
+{
+
+class VSceneFramebufferObject;
+
+/// Draws the scene of one SceneFramebufferObject, on the render thread, and picks from it. It owns the OpenGL objects
+/// of the view and lives as long as they do.
+class VSceneFramebufferRenderer : public QQuickFramebufferObject::Renderer
+{
+public:
+	VSceneFramebufferRenderer();
+	~VSceneFramebufferRenderer() override;
+
+	/// The one place where the two threads exchange anything: the user interface thread waits.
+	void synchronize(QQuickFramebufferObject* io_pItem) override;
+	QOpenGLFramebufferObject* createFramebufferObject(const QSize& i_rSize) override;
+	void render() override;
+
+	/// How many there are in the process, and how many there were.
+	static std::uint64_t LivingCount();
+	static std::uint64_t MadeCount();
+
+private:
+	void TakeScene(VSceneFramebufferObject& io_rItem);
+	void Track(VSceneFramebufferObject& io_rItem);
+
+	VFrameRenderer m_Renderer;
+	QQuickWindow* m_pWindow = nullptr;
+	bool m_bPickActive = false;
+	/// What is to be picked.
+	VPickRequest m_Request;
+	/// What the last pick found.
+	std::optional<VPick> m_Pick;
+	bool m_bContinuousUpdate = true;
+	bool m_bVisible = false;
+	ETracking m_Tracking = ETrackingNone;
+	std::vector<NVX::ISelectionItem> m_Tracked;
+};
+
+} // namespace OrlexGraphics
