@@ -1,7 +1,7 @@
 #include "CoreOrlexQRTIO/Reader.h"
 
 #include "CoreOrlexQRTIO/Limits.h"
-#include "CoreOrlexQRTIO/ReadChecks.h"
+#include "CoreOrlexQRTIO/read/ReadChecks.h"
 #include "CoreOrlexTypes/NameHash.h"
 #include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 #include "DebugServices/GlobalLog.h"

@@ -1,7 +1,7 @@
-#include "CoreOrlexQRTIO/AttributeReading.h"
-#include "CoreOrlexQRTIO/FormatFunctions.h"
-#include "CoreOrlexQRTIO/FormatTable.h"
 #include "CoreOrlexQRTIO/FormatVersions.h"
+#include "CoreOrlexQRTIO/format/FormatFunctions.h"
+#include "CoreOrlexQRTIO/format/FormatTable.h"
+#include "CoreOrlexQRTIO/read/AttributeReading.h"
 
 #include <boost/format.hpp>
 

@@ -1,8 +1,8 @@
-#include "CoreOrlexQRTIO/AttributeReading.h"
-#include "CoreOrlexQRTIO/EnumTables.h"
-#include "CoreOrlexQRTIO/FormatFunctions.h"
-#include "CoreOrlexQRTIO/JointGeometry.h"
-#include "CoreOrlexQRTIO/TargetKinds.h"
+#include "CoreOrlexQRTIO/format/EnumTables.h"
+#include "CoreOrlexQRTIO/format/FormatFunctions.h"
+#include "CoreOrlexQRTIO/format/TargetKinds.h"
+#include "CoreOrlexQRTIO/read/AttributeReading.h"
+#include "CoreOrlexQRTIO/values/JointGeometry.h"
 #include "CoreOrlexTypes/NameHash.h"
 
 #include <boost/format.hpp>

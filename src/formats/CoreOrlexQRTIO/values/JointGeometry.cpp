@@ -1,4 +1,4 @@
-#include "CoreOrlexQRTIO/JointGeometry.h"
+#include "CoreOrlexQRTIO/values/JointGeometry.h"
 
 #include "CoreOrlexTypesUtils/rigidbody/AxisOrientation.h"
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/JointGeometry.h"
 #include "CoreOrlexQRTIO/SubjectQRTExtras.h"
+#include "CoreOrlexQRTIO/values/JointGeometry.h"
 #include "CoreOrlexTypes/SubjectApplicationData.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "UtilsRapidXml/Version.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/FormatTable.h"
+#include "CoreOrlexQRTIO/format/FormatTable.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
 
 #include <algorithm>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/FormatFunctions.h"
+#include "CoreOrlexQRTIO/format/FormatFunctions.h"
 
 namespace CoreOrlexTypesUtils
 {

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/JointGeometry.h"
 #include "CoreOrlexQRTIO/SubjectQRTExtras.h"
+#include "CoreOrlexQRTIO/values/JointGeometry.h"
 #include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 
 #include <optional>

@@ -1,7 +1,7 @@
-#include "CoreOrlexQRTIO/AttributeWriting.h"
-#include "CoreOrlexQRTIO/EnumTables.h"
-#include "CoreOrlexQRTIO/FormatTable.h"
-#include "CoreOrlexQRTIO/WriteSections.h"
+#include "CoreOrlexQRTIO/format/EnumTables.h"
+#include "CoreOrlexQRTIO/format/FormatTable.h"
+#include "CoreOrlexQRTIO/write/AttributeWriting.h"
+#include "CoreOrlexQRTIO/write/WriteSections.h"
 
 namespace CoreOrlexQRTIO
 {

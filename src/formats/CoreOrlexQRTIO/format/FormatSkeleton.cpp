@@ -1,8 +1,8 @@
-#include "CoreOrlexQRTIO/AttributeReading.h"
-#include "CoreOrlexQRTIO/EnumTables.h"
-#include "CoreOrlexQRTIO/FormatFunctions.h"
-#include "CoreOrlexQRTIO/FormatTable.h"
-#include "CoreOrlexQRTIO/JointElements.h"
+#include "CoreOrlexQRTIO/format/EnumTables.h"
+#include "CoreOrlexQRTIO/format/FormatFunctions.h"
+#include "CoreOrlexQRTIO/format/FormatTable.h"
+#include "CoreOrlexQRTIO/format/JointElements.h"
+#include "CoreOrlexQRTIO/read/AttributeReading.h"
 #include "math/NumberText.h"
 
 namespace CoreOrlexQRTIO

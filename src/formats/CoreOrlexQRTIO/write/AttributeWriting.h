@@ -1,6 +1,6 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/Format.h"
+#include "CoreOrlexQRTIO/format/Format.h"
 #include "CoreOrlexTypes/SubjectApplicationData.h"
 #include "UtilsRapidXml/WriterNode.h"
 

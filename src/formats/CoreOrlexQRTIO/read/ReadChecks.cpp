@@ -1,7 +1,7 @@
-#include "CoreOrlexQRTIO/ReadChecks.h"
+#include "CoreOrlexQRTIO/read/ReadChecks.h"
 
-#include "CoreOrlexQRTIO/Evaluation.h"
-#include "CoreOrlexQRTIO/ExpressionList.h"
+#include "CoreOrlexQRTIO/values/Evaluation.h"
+#include "CoreOrlexQRTIO/values/ExpressionList.h"
 #include "CoreOrlexTypes/NameHash.h"
 
 #include <boost/format.hpp>

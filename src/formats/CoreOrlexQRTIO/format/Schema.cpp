@@ -1,5 +1,5 @@
-#include "CoreOrlexQRTIO/FormatFunctions.h"
 #include "CoreOrlexQRTIO/Reader.h"
+#include "CoreOrlexQRTIO/format/FormatFunctions.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
 #include "UtilsFileSystem/SaveFile.h"

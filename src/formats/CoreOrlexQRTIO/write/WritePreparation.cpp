@@ -1,9 +1,9 @@
-#include "CoreOrlexQRTIO/WritePreparation.h"
+#include "CoreOrlexQRTIO/write/WritePreparation.h"
 
-#include "CoreOrlexQRTIO/Evaluation.h"
-#include "CoreOrlexQRTIO/ExpressionList.h"
-#include "CoreOrlexQRTIO/Format.h"
 #include "CoreOrlexQRTIO/Limits.h"
+#include "CoreOrlexQRTIO/format/Format.h"
+#include "CoreOrlexQRTIO/values/Evaluation.h"
+#include "CoreOrlexQRTIO/values/ExpressionList.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "math/NumberText.h"
 

@@ -1,4 +1,4 @@
-#include "CoreOrlexQRTIO/Evaluation.h"
+#include "CoreOrlexQRTIO/values/Evaluation.h"
 
 namespace CoreOrlexQRTIO
 {

@@ -1,6 +1,6 @@
-#include "CoreOrlexQRTIO/AttributeWriting.h"
+#include "CoreOrlexQRTIO/write/AttributeWriting.h"
 
-#include "CoreOrlexQRTIO/ExpressionList.h"
+#include "CoreOrlexQRTIO/values/ExpressionList.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "math/NumberText.h"
 

@@ -1,4 +1,4 @@
-#include "CoreOrlexQRTIO/EnumTables.h"
+#include "CoreOrlexQRTIO/format/EnumTables.h"
 
 namespace CoreOrlexQRTIO::EnumTables
 {

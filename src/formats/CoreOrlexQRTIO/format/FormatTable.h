@@ -1,6 +1,6 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/Format.h"
+#include "CoreOrlexQRTIO/format/Format.h"
 
 namespace CoreOrlexQRTIO::Format
 {

@@ -1,8 +1,8 @@
-#include "CoreOrlexQRTIO/AttributeWriting.h"
-#include "CoreOrlexQRTIO/EnumTables.h"
-#include "CoreOrlexQRTIO/JointGeometry.h"
-#include "CoreOrlexQRTIO/TargetKinds.h"
-#include "CoreOrlexQRTIO/WriteSections.h"
+#include "CoreOrlexQRTIO/format/EnumTables.h"
+#include "CoreOrlexQRTIO/format/TargetKinds.h"
+#include "CoreOrlexQRTIO/values/JointGeometry.h"
+#include "CoreOrlexQRTIO/write/AttributeWriting.h"
+#include "CoreOrlexQRTIO/write/WriteSections.h"
 
 #include <boost/format.hpp>
 

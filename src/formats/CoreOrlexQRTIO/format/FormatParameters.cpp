@@ -1,7 +1,7 @@
-#include "CoreOrlexQRTIO/AttributeReading.h"
-#include "CoreOrlexQRTIO/EnumTables.h"
-#include "CoreOrlexQRTIO/FormatFunctions.h"
-#include "CoreOrlexQRTIO/FormatTable.h"
+#include "CoreOrlexQRTIO/format/EnumTables.h"
+#include "CoreOrlexQRTIO/format/FormatFunctions.h"
+#include "CoreOrlexQRTIO/format/FormatTable.h"
+#include "CoreOrlexQRTIO/read/AttributeReading.h"
 
 namespace CoreOrlexQRTIO
 {

@@ -1,6 +1,6 @@
-#include "CoreOrlexQRTIO/AttributeReading.h"
-#include "CoreOrlexQRTIO/FormatFunctions.h"
-#include "CoreOrlexQRTIO/FormatTable.h"
+#include "CoreOrlexQRTIO/format/FormatFunctions.h"
+#include "CoreOrlexQRTIO/format/FormatTable.h"
+#include "CoreOrlexQRTIO/read/AttributeReading.h"
 #include "CoreOrlexTypes/JointType.h"
 
 #include <boost/format.hpp>

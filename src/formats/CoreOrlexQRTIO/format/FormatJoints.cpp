@@ -1,7 +1,7 @@
-#include "CoreOrlexQRTIO/AttributeReading.h"
-#include "CoreOrlexQRTIO/EnumTables.h"
-#include "CoreOrlexQRTIO/FormatFunctions.h"
-#include "CoreOrlexQRTIO/JointElements.h"
+#include "CoreOrlexQRTIO/format/EnumTables.h"
+#include "CoreOrlexQRTIO/format/FormatFunctions.h"
+#include "CoreOrlexQRTIO/format/JointElements.h"
+#include "CoreOrlexQRTIO/read/AttributeReading.h"
 #include "math/NumberText.h"
 
 namespace CoreOrlexQRTIO

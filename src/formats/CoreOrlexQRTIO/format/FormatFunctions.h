@@ -1,7 +1,7 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/Format.h"
 #include "CoreOrlexQRTIO/SubjectQRTExtras.h"
+#include "CoreOrlexQRTIO/format/Format.h"
 #include "CoreOrlexTypes/SubjectApplicationData.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
 

@@ -1,4 +1,4 @@
-#include "CoreOrlexQRTIO/ExpressionList.h"
+#include "CoreOrlexQRTIO/values/ExpressionList.h"
 
 #include <algorithm>
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/Format.h"
-#include "CoreOrlexQRTIO/WritePreparation.h"
+#include "CoreOrlexQRTIO/format/Format.h"
+#include "CoreOrlexQRTIO/write/WritePreparation.h"
 #include "UtilsRapidXml/WriterNode.h"
 
 /// The sections of a skeleton file, in the order in which they are written.

@@ -1,7 +1,7 @@
-#include "CoreOrlexQRTIO/AttributeWriting.h"
-#include "CoreOrlexQRTIO/EnumTables.h"
-#include "CoreOrlexQRTIO/JointElements.h"
-#include "CoreOrlexQRTIO/WriteSections.h"
+#include "CoreOrlexQRTIO/format/EnumTables.h"
+#include "CoreOrlexQRTIO/format/JointElements.h"
+#include "CoreOrlexQRTIO/write/AttributeWriting.h"
+#include "CoreOrlexQRTIO/write/WriteSections.h"
 
 #include <boost/format.hpp>
 

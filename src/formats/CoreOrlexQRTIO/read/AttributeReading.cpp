@@ -1,6 +1,6 @@
-#include "CoreOrlexQRTIO/AttributeReading.h"
+#include "CoreOrlexQRTIO/read/AttributeReading.h"
 
-#include "CoreOrlexQRTIO/ExpressionList.h"
+#include "CoreOrlexQRTIO/values/ExpressionList.h"
 
 #include "math/NumberText.h"
 
