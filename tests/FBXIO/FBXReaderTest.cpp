@@ -149,9 +149,9 @@ TEST_P(Reader, TellsOfAPassword)
 TEST_P(Reader, KeepsWhatWasReadOfADamagedFile)
 {
 	std::vector<VTestRecord> records = Records(GetParam(), Bones({{"hips", "LimbNode", -1, {}}}, {{"UpAxis", {0}}}));
-	records.push_back({"Takes", {}, {{"Take", {1.0}, {}}}});
+	records.push_back({"Extras", {}, {{"Last", {1.0}, {}}}});
 	std::string bytes = Write(GetParam(), records);
-	const std::size_t at = bytes.rfind("Take");
+	const std::size_t at = bytes.rfind("Last");
 	bytes[at + 4] = '?';
 	const VLoaded loaded(bytes);
 	EXPECT_TRUE(loaded.m_bLoaded);

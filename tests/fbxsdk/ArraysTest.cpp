@@ -9,6 +9,7 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <limits>
 #include <numeric>
 
 using namespace FbxFormat;
@@ -131,6 +132,28 @@ TEST(Arrays, OfTextMustHoldTheirCount)
 		VDecodeBudget budget;
 		VArrayNumbers<double> numbers;
 		EXPECT_FALSE(ReadArray(tree, 1, budget, numbers)) << pText;
+	}
+}
+
+/// Each spelling as if the general scanner had read it.
+TEST(Arrays, OfTextHaveNumbersOfEverySpelling)
+{
+	const std::string numbers = " 7,-8 ,2147483648,+3,.5,5.,-0,1e2,0x1p4,1e400,-1.#INF,1e-400,-2.9999999";
+	for (const std::string& rText : {"*13 { a:" + numbers + " }", numbers})
+	{
+		const std::string bytes = "; FBX 7.4.0\nA:" + rText + "\n";
+		VElementTree tree;
+		ASSERT_TRUE(tree.Read(bytes, DetectFileKind(bytes))) << tree.Error();
+		VDecodeBudget budget;
+		VArrayNumbers<double> reals;
+		EXPECT_TRUE(ReadArray(tree, 1, budget, reals));
+		const double infinity = std::numeric_limits<double>::infinity();
+		EXPECT_EQ(VNumbers(reals.begin(), reals.end()),
+		    (VNumbers{7, -8, 2147483648, 3, 0.5, 5, 0, 100, 16, infinity, -infinity, 0, -2.9999999}));
+		EXPECT_FALSE(std::signbit(reals[6])) << "a whole number has no sign when it is 0";
+		VArrayNumbers<std::int32_t> integers;
+		EXPECT_TRUE(ReadArray(tree, 1, budget, integers));
+		EXPECT_EQ(integers, (VArrayNumbers<std::int32_t>{7, -8, INT32_MIN, 3, 0, 5, 0, 100, 16, 0, 0, 0, -2}));
 	}
 }
 

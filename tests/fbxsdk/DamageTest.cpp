@@ -60,6 +60,9 @@ TEST(Damage, AMillionBytesOfAnythingAreReadInOneGo)
 	              + repeat("C: \"OO\",5,0\n") + "}\n")
 	              .m_Nodes,
 	    2);
+	// What is passed over has no end.
+	for (const char* pUnit : {"Pose: 5,\"\" {\n", "Pose: 5,\"\" {}\n", "Pose: 5,\"\" { \"\n"})
+		EXPECT_FALSE(Load(c_Head + "Objects: {\n" + repeat(pUnit)).m_bComplete) << pUnit;
 	const std::string binary = Write(c_Forms[1], std::vector<VTestRecord>{}).substr(0, 27);
 	EXPECT_FALSE(Load(binary + repeat("\xff")).m_bComplete);
 	EXPECT_FALSE(Load(binary + repeat("\1"s + std::string(12, '\0'))).m_bComplete);
@@ -82,7 +85,7 @@ TEST(Damage, ListsAreBounded)
 	    {Limits::c_Nodes, "Model: 7,\"Model::a\",\"Null\"\n", " nodes"},
 	    {Limits::c_Parts, "Video: 7,\"\"\n", " materials, textures, pictures, meshes and skins"},
 	    {Limits::c_Clusters, "Deformer: 7,\"\",\"Cluster\"\n", " clusters of skins"},
-	    {Limits::c_Objects, "Pose: 7,\"\"\n", " objects"}};
+	    {Limits::c_Objects, "Display: 7,\"\"\n", " objects"}};
 	for (const auto& [limit, pObject, pWhat] : rows)
 	{
 		EXPECT_FALSE(isBeyond(objects(limit, pObject), std::to_string(limit) + pWhat));

@@ -69,6 +69,34 @@ TEST(Records, AreTheSameInEveryForm)
 		    << rForm.m_pName;
 }
 
+/// Behind what moves stands what does not; damage in it is not seen, but when all is read.
+TEST(Records, OfWhatMovesAreLeftOutUnlessAskedFor)
+{
+	const std::vector<VTestRecord> keys{{"KeyTime", {VNumbers(100, 0.5)}, {}}, {"Note", {"a } brace; {{ {"s}, {}}};
+	const std::vector<VTestRecord> records{{"Pose", {}, {{"Kept", {1}, {}}}},
+	    {"Objects", {},
+	        {{"AnimationCurve", {7, "x"s}, keys}, {"Model", {8, "m"s}, {{"Pose", {2}, {}}}},
+	            {"Constraint", {9, "c"s}, {{"Bad?", {3}, {}}}}, {"Pose", {10, "p"s}, {}}, {"Model", {11, "n"s}, {}}}},
+	    {"Takes", {}, {{"Take", {"t"s}, keys}}}, {"End", {4}, {}}};
+	for (const VTestForm& rForm : c_Forms)
+	{
+		std::string bytes = Write(rForm, records);
+		std::string error;
+		EXPECT_NE(Read(bytes).find("Take('t')"), std::string::npos) << rForm.m_pName;
+		// No type of the binary form, no name of the text form.
+		bytes[bytes.find("Bad?") + 4] = rForm.m_Form == EForm::Binary ? '?' : '"';
+		if (rForm.m_Form == EForm::Text)
+			bytes.insert(bytes.find("Bad?") + 5, "\"");
+		Read(bytes, &error);
+		EXPECT_NE(error, "") << rForm.m_pName;
+		VElementTree tree;
+		EXPECT_TRUE(tree.Read(bytes, DetectFileKind(bytes), EContent::WithoutMotion)) << tree.Error();
+		EXPECT_EQ(
+		    Dump(tree, VElementTree::c_Root), "Pose(){Kept(1)} Objects(){Model(8,'m'){Pose(2)} Model(11,'n')} End(4)")
+		    << rForm.m_pName;
+	}
+}
+
 TEST(Records, BinaryHasValuesOfEveryType)
 {
 	const VTestRecord record{"R",

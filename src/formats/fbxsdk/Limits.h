@@ -16,7 +16,7 @@ inline constexpr std::size_t c_RecordDepth = 64;
 inline constexpr std::uint64_t c_FileBytes = std::uint64_t(2) << 30;
 
 /// The lists that are made of a file, whatever is in it, stay below 150 MB together: 28 bytes for a record, 24 for a
-/// connection, 112 for an object, 1 KiB for a node, 0.2 KiB for a cluster, 0.8 KiB at most for another part of nodes.
+/// connection, 150 for an object, 1 KiB for a node, 0.2 KiB for a cluster, 0.8 KiB at most for another part of nodes.
 /// Large scenes with animation have some hundred thousand records; a character has some hundred nodes, and some
 /// thousand objects when it moves.
 inline constexpr std::size_t c_Records = 1'000'000;

@@ -7,6 +7,8 @@
 #include <libdeflate.h>
 
 #include <algorithm>
+#include <charconv>
+#include <cmath>
 #include <limits>
 #include <memory>
 #include <type_traits>
@@ -92,6 +94,23 @@ bool Append(const VValue& i_rValue, VArrayNumbers<T>& io_rNumbers)
 	return true;
 }
 
+/// Adds a number in the spelling of nearly all of them.
+/// @return the place behind it, or null, with nothing added, for what ParseNumber must look at.
+template <typename T>
+const char* ParseDirect(const char* i_pFrom, const char* i_pEnd, VArrayNumbers<T>& io_rNumbers)
+{
+	// Not float: its numbers are rounded twice, as everywhere.
+	std::conditional_t<std::is_integral_v<T>, T, double> number;
+	const auto [p, error] = std::from_chars(i_pFrom, i_pEnd, number);
+	if (error != std::errc() || !Text::EndsValue(p, i_pEnd))
+		return nullptr;
+	if constexpr (!std::is_integral_v<T>)
+		if (!std::isnormal(number) && *i_pFrom != '0')
+			return nullptr;
+	io_rNumbers.push_back(T(number));
+	return p;
+}
+
 template <typename T>
 bool ParseText(std::string_view i_Text, std::uint32_t i_Count, VArrayNumbers<T>& o_rNumbers)
 {
@@ -100,11 +119,16 @@ bool ParseText(std::string_view i_Text, std::uint32_t i_Count, VArrayNumbers<T>&
 	const char* pNext = Text::SkipSpace(i_Text.data(), pEnd);
 	while (pNext && pNext != pEnd)
 	{
-		const char* const pNumberEnd = Text::ScanValue(pNext, pEnd);
-		if (!pNumberEnd || o_rNumbers.size() == i_Count
-		    || !Append(ParseNumber({pNext, std::size_t(pNumberEnd - pNext)}), o_rNumbers))
+		if (o_rNumbers.size() == i_Count)
 			return false;
-		pNext = Text::NextValue(pNumberEnd, pEnd);
+		const char* p = ParseDirect(pNext, pEnd, o_rNumbers);
+		if (!p)
+		{
+			p = Text::ScanValue(pNext, pEnd);
+			if (!p || !Append(ParseNumber({pNext, std::size_t(p - pNext)}), o_rNumbers))
+				return false;
+		}
+		pNext = Text::NextValue(p, pEnd);
 	}
 	return o_rNumbers.size() == i_Count;
 }
@@ -154,7 +178,7 @@ bool FbxFormat::ReadCharged(const VElementTree& i_rTree, VElementIndex i_Element
 	const VElement& rElement = i_rTree[i_Element];
 	const Binary::VArray array = ArrayOf(i_rTree, i_Element);
 	const bool bSound = array.m_Type != 0 ? DecodeBinary(array, o_rNumbers)
-	    : rElement.m_Form == EValueForm::TextArray
+	    : rElement.m_Form != EValueForm::Binary
 	    ? ParseText(i_rTree.Values(i_Element), rElement.m_ValueCount, o_rNumbers)
 	    : ReadList(i_rTree, i_Element, o_rNumbers);
 	if (!bSound)

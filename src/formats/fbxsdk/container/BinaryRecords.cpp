@@ -90,6 +90,12 @@ void FbxFormat::ReadBinaryRecords(std::string_view i_Bytes, std::uint32_t i_Vers
 			continue;
 		}
 
+		if (io_rBuilder.IsLeftOut(i_Bytes.substr(name, header.m_NameLength)))
+		{
+			position = end;
+			continue;
+		}
+
 		VElement element;
 		element.m_Name = std::uint32_t(name);
 		element.m_NameLength = header.m_NameLength;

@@ -4,9 +4,24 @@
 #include "fbxsdk/container/FileKind.h"
 #include "fbxsdk/container/TreeBuilder.h"
 
-bool FbxFormat::VElementTree::Read(std::string_view i_Bytes, const VFileKind& i_rKind)
+#include <algorithm>
+
+namespace
 {
-	VTreeBuilder builder(*this, i_Bytes);
+
+/// Objects of that kind, since version 7 by their own names; before, what moves stands in "Takes".
+constexpr std::string_view c_MotionKinds[]{
+    "AnimationCurve", "AnimationCurveNode", "AnimationLayer", "AnimationStack", "Constraint", "Pose"};
+
+/// Exporters write some ten times as many bytes for a record; what is not used of the list costs nothing.
+constexpr std::size_t c_BytesOfRecord = 64;
+
+} // namespace
+
+bool FbxFormat::VElementTree::Read(std::string_view i_Bytes, const VFileKind& i_rKind, EContent i_Content)
+{
+	m_Elements.reserve(std::min(Limits::c_Records, i_Bytes.size() / c_BytesOfRecord + 1));
+	VTreeBuilder builder(*this, i_Bytes, i_Content);
 	switch (i_rKind.m_Kind)
 	{
 	case EFileKind::Binary: ReadBinaryRecords(i_Bytes, i_rKind.m_Version, builder); break;
@@ -42,10 +57,21 @@ FbxFormat::VElementTree::VChildren FbxFormat::VElementTree::Children(VElementInd
 	return {{*this, first}, {*this, c_NoElement}};
 }
 
-FbxFormat::VTreeBuilder::VTreeBuilder(VElementTree& io_rTree, std::string_view i_Bytes) : m_rTree(io_rTree)
+FbxFormat::VTreeBuilder::VTreeBuilder(VElementTree& io_rTree, std::string_view i_Bytes, EContent i_Content)
+    : m_rTree(io_rTree), m_Content(i_Content)
 {
 	m_rTree.m_Bytes = i_Bytes;
 	m_Open.push_back({VElementTree::c_Root, c_NoElement, i_Bytes.size()});
+}
+
+bool FbxFormat::VTreeBuilder::IsLeftOut(std::string_view i_Name) const
+{
+	if (m_Content == EContent::All || Depth() > 2)
+		return false;
+	if (Depth() == 1)
+		return i_Name == "Takes";
+	return m_rTree.Name(m_Open.back().m_Element) == "Objects"
+	    && std::ranges::find(c_MotionKinds, i_Name) != std::end(c_MotionKinds);
 }
 
 bool FbxFormat::VTreeBuilder::Add(const VElement& i_rElement)

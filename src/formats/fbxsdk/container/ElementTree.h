@@ -38,6 +38,15 @@ struct VElement
 	EValueForm m_Form = EValueForm::Binary;
 };
 
+/// What of a file is looked at.
+enum class EContent
+{
+	All,
+	/// Nothing of animation, poses and constraints, which are most of the records of a character that moves: what is
+	/// in them, damage too, is passed over unread.
+	WithoutMotion
+};
+
 /// The records of one file, both forms alike. The bytes of the file must outlive it.
 class VElementTree
 {
@@ -48,7 +57,7 @@ public:
 
 	/// Reads all records. What is broken is passed over or cut short, and told in Error; the rest stays.
 	/// @return false if anything was broken.
-	bool Read(std::string_view i_Bytes, const VFileKind& i_rKind);
+	bool Read(std::string_view i_Bytes, const VFileKind& i_rKind, EContent i_Content = EContent::All);
 
 	/// The first thing that was broken, empty if nothing was.
 	const std::string& Error() const { return m_Error; }
@@ -67,6 +76,12 @@ public:
 	class VChildIterator
 	{
 	public:
+		using iterator_category = std::forward_iterator_tag;
+		using value_type = VElementIndex;
+		using difference_type = std::ptrdiff_t;
+		using pointer = const VElementIndex*;
+		using reference = VElementIndex;
+
 		VChildIterator(const VElementTree& i_rTree, VElementIndex i_Element) : m_rTree(i_rTree), m_Element(i_Element) {}
 		VElementIndex operator*() const { return m_Element; }
 		bool operator==(const VChildIterator& i_rOther) const { return m_Element == i_rOther.m_Element; }

@@ -67,7 +67,8 @@ private:
 		m_p = FindValues();
 		if (Is('*'))
 			return ReadArray(element);
-		if (!ReadList(element) || !m_rBuilder.Add(element))
+		const bool bLeftOut = m_rBuilder.IsLeftOut({pName, length});
+		if (!ReadList(element) || (!bLeftOut && !m_rBuilder.Add(element)))
 			return false;
 		m_p = Text::SkipSpace(m_p, m_pEnd);
 		if (!Is('{'))
@@ -77,7 +78,37 @@ private:
 			return true;
 		}
 		++m_p;
-		return m_rBuilder.Open(m_pEnd - m_pBegin);
+		return bLeftOut ? SkipBraces() : m_rBuilder.Open(m_pEnd - m_pBegin);
+	}
+
+	/// Behind a brace that opens: to behind the one that closes it. False if reading cannot go on.
+	bool SkipBraces()
+	{
+		for (std::size_t depth = 1; depth > 0;)
+		{
+			m_p = Text::FindMark(m_p, m_pEnd);
+			if (m_p == m_pEnd)
+			{
+				Error("it ends inside a record");
+				return true;
+			}
+			const char* pAfter = m_p + 1;
+			switch (*m_p)
+			{
+			case '{': ++depth; break;
+			case '}': --depth; break;
+			case ';': pAfter = Text::SkipLine(m_p, m_pEnd); break;
+			default:
+				pAfter = Text::ScanValue(m_p, m_pEnd);
+				if (!pAfter)
+				{
+					Error("a quote is not closed");
+					return false;
+				}
+			}
+			m_p = pAfter;
+		}
+		return true;
 	}
 
 	/// Behind the colon of a name: the values, which may begin on a later line. The end of this one if there are none.

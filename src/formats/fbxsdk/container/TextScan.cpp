@@ -13,7 +13,9 @@ enum EByteClass : unsigned char
 	/// Ends a name.
 	ENameEnd = 4,
 	/// Ends a bare value.
-	EValueEnd = 8
+	EValueEnd = 8,
+	/// Braces, quotes and comments.
+	EMark = 16
 };
 
 constexpr std::array<unsigned char, 256> c_ByteClasses = []
@@ -28,6 +30,7 @@ constexpr std::array<unsigned char, 256> c_ByteClasses = []
 	mark("\r\n\f\v", ELineEnd);
 	mark(" \t\r\n\f\v{},\";*:", ENameEnd);
 	mark(" \t\r\n\f\v{},\";:", EValueEnd);
+	mark("{}\";", EMark);
 	return classes;
 }();
 
@@ -76,6 +79,26 @@ const char* FbxFormat::Text::SkipLine(const char* i_pFrom, const char* i_pEnd)
 	return i_pFrom;
 }
 
+const char* FbxFormat::Text::FindMark(const char* i_pFrom, const char* i_pEnd)
+{
+	// The loop over a block has no way out, so that a compiler makes a few instructions of it.
+	constexpr std::ptrdiff_t c_Block = 64;
+	for (; i_pEnd - i_pFrom >= c_Block; i_pFrom += c_Block)
+	{
+		unsigned char marks = 0;
+		for (std::ptrdiff_t i = 0; i < c_Block; ++i)
+		{
+			const char byte = i_pFrom[i];
+			marks |= (byte == '{') | (byte == '}') | (byte == '"') | (byte == ';');
+		}
+		if (marks)
+			break;
+	}
+	while (i_pFrom != i_pEnd && !Is(*i_pFrom, EMark))
+		++i_pFrom;
+	return i_pFrom;
+}
+
 const char* FbxFormat::Text::ScanName(const char* i_pFrom, const char* i_pEnd)
 {
 	while (i_pFrom != i_pEnd && !Is(*i_pFrom, ENameEnd))
@@ -93,6 +116,11 @@ const char* FbxFormat::Text::ScanValue(const char* i_pFrom, const char* i_pEnd)
 	while (i_pFrom != i_pEnd && !Is(*i_pFrom, EValueEnd))
 		++i_pFrom;
 	return i_pFrom;
+}
+
+bool FbxFormat::Text::EndsValue(const char* i_pAt, const char* i_pEnd)
+{
+	return i_pAt == i_pEnd || Is(*i_pAt, EValueEnd);
 }
 
 const char* FbxFormat::Text::NextValue(const char* i_pFrom, const char* i_pEnd)

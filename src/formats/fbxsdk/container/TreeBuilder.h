@@ -10,7 +10,10 @@ namespace FbxFormat
 class VTreeBuilder
 {
 public:
-	VTreeBuilder(VElementTree& io_rTree, std::string_view i_Bytes);
+	VTreeBuilder(VElementTree& io_rTree, std::string_view i_Bytes, EContent i_Content);
+
+	/// Whether nobody asks for a record of that name in the innermost open one: it is passed over.
+	bool IsLeftOut(std::string_view i_Name) const;
 
 	/// Adds a record as the last child of the innermost open one. False if there are too many records: reading ends.
 	bool Add(const VElement& i_rElement);
@@ -35,6 +38,7 @@ private:
 	};
 
 	VElementTree& m_rTree;
+	const EContent m_Content;
 	std::vector<VOpen> m_Open;
 };
 

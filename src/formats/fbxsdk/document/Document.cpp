@@ -5,19 +5,15 @@
 #include "fbxsdk/container/Values.h"
 
 #include <algorithm>
+#include <iterator>
+#include <random>
 
 namespace
 {
 
 using namespace FbxFormat;
 
-/// Of several objects with one key the first in the file is found.
-template <typename TKey>
-VObjectIndex FindKey(const std::vector<std::pair<TKey, VObjectIndex>>& i_rSorted, const TKey& i_rKey)
-{
-	const auto found = std::lower_bound(i_rSorted.begin(), i_rSorted.end(), std::pair(i_rKey, VObjectIndex(0)));
-	return found != i_rSorted.end() && found->first == i_rKey ? found->second : c_NoObject;
-}
+const std::uint64_t c_HashSeed = std::random_device()();
 
 } // namespace
 
@@ -39,7 +35,11 @@ void FbxFormat::VDocument::ReadObjects()
 	{
 		if (m_rTree.Name(section) != "Objects")
 			continue;
-		for (const VElementIndex element : m_rTree.Children(section))
+		const VElementTree::VChildren elements = m_rTree.Children(section);
+		const auto count = std::size_t(std::distance(elements.begin(), elements.end()));
+		m_Objects.reserve(std::min(Limits::c_Objects, m_Objects.size() + count));
+		m_ByNumber.reserve(m_Objects.capacity());
+		for (const VElementIndex element : elements)
 		{
 			if (m_Objects.size() == Limits::c_Objects)
 			{
@@ -53,7 +53,7 @@ void FbxFormat::VDocument::ReadObjects()
 			VValue value = values.Next();
 			if (value.m_Kind == EValueKind::Integer)
 			{
-				m_ByNumber.emplace_back(value.m_Integer, index);
+				m_ByNumber.try_emplace(value.m_Integer, index);
 				value = values.Next();
 			}
 			else if (value.m_Kind == EValueKind::Text)
@@ -68,18 +68,35 @@ void FbxFormat::VDocument::ReadObjects()
 			    {element, m_rTree.Name(element), SplitFullName(value.m_Text).m_Name, values.Next().m_Text});
 		}
 	}
-	std::sort(m_ByNumber.begin(), m_ByNumber.end());
 	std::sort(m_ByName.begin(), m_ByName.end());
 }
 
+/// The finaliser of SplitMix64, from where nobody who writes a file can know.
+std::size_t FbxFormat::VDocument::VNumberHash::operator()(std::int64_t i_Number) const
+{
+	std::uint64_t bits = std::uint64_t(i_Number) + c_HashSeed * 0x9E3779B97F4A7C15u;
+	bits = (bits ^ bits >> 30) * 0xBF58476D1CE4E5B9u;
+	bits = (bits ^ bits >> 27) * 0x94D049BB133111EBu;
+	return bits ^ bits >> 31;
+}
+
+/// Of several objects with one key the first in the file is found.
 FbxFormat::VObjectIndex FbxFormat::VDocument::FindObject(const VValue& i_rKey) const
 {
 	if (i_rKey.m_Kind == EValueKind::Integer)
-		return i_rKey.m_Integer == 0 ? c_SceneObject : FindKey(m_ByNumber, i_rKey.m_Integer);
+	{
+		if (i_rKey.m_Integer == 0)
+			return c_SceneObject;
+		const auto found = m_ByNumber.find(i_rKey.m_Integer);
+		return found != m_ByNumber.end() ? found->second : c_NoObject;
+	}
 	if (i_rKey.m_Kind != EValueKind::Text)
 		return c_NoObject;
 	const VFullName name = SplitFullName(i_rKey.m_Text);
-	return name.m_Name == "Scene" && name.m_Class == "Model" ? c_SceneObject : FindKey(m_ByName, i_rKey.m_Text);
+	if (name.m_Name == "Scene" && name.m_Class == "Model")
+		return c_SceneObject;
+	const auto found = std::lower_bound(m_ByName.begin(), m_ByName.end(), std::pair(i_rKey.m_Text, VObjectIndex(0)));
+	return found != m_ByName.end() && found->first == i_rKey.m_Text ? found->second : c_NoObject;
 }
 
 void FbxFormat::VDocument::ReadConnections()
@@ -96,8 +113,10 @@ void FbxFormat::VDocument::ReadConnections()
 				continue;
 			VConnection connection;
 			connection.m_Child = FindObject(values.Next());
+			if (connection.m_Child == c_NoObject)
+				continue;
 			connection.m_Parent = FindObject(values.Next());
-			if (connection.m_Child == c_NoObject || connection.m_Parent == c_NoObject)
+			if (connection.m_Parent == c_NoObject)
 				continue;
 			if (kind == "OP")
 				connection.m_Property = values.Next().m_Text;

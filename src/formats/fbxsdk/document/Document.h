@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <string_view>
+#include <unordered_map>
 #include <utility>
 #include <vector>
 
@@ -37,7 +38,8 @@ struct VConnection
 };
 
 /// What the records of a file say: its objects and how they are connected. Objects are known by number since version
-/// 7, by their full name before. Looking one up searches sorted lists, so no choice of keys makes it slow.
+/// 7, by their full name before. No choice of keys makes looking one up slow: names stand in a sorted list, numbers in
+/// a hash of this process alone.
 /// The tree must outlive it.
 class VDocument
 {
@@ -83,7 +85,11 @@ private:
 	std::size_t m_Nameless = 0;
 	std::vector<VObject> m_Objects;
 	std::vector<VConnection> m_Connections;
-	std::vector<std::pair<std::int64_t, VObjectIndex>> m_ByNumber;
+	struct VNumberHash
+	{
+		std::size_t operator()(std::int64_t i_Number) const;
+	};
+	std::unordered_map<std::int64_t, VObjectIndex, VNumberHash> m_ByNumber;
 	std::vector<std::pair<std::string_view, VObjectIndex>> m_ByName;
 };
 

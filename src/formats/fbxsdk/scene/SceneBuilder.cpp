@@ -104,7 +104,9 @@ FbxFormat::VImportResult FbxFormat::VSceneBuilder::Build(
 	rContent.m_Bytes = std::move(i_Bytes);
 	rContent.m_Budget = {Limits::DecodedBytes(rContent.m_Bytes.View().size())};
 	VImportResult result;
-	rContent.m_Tree.Read(rContent.m_Bytes.View(), i_rKind);
+	// Before version 6 the pose stands among what moves.
+	const bool bAll = i_rKind.m_Version < c_FirstVersionWithObjects;
+	rContent.m_Tree.Read(rContent.m_Bytes.View(), i_rKind, bAll ? EContent::All : EContent::WithoutMotion);
 	if (IsEncrypted(rContent.m_Tree))
 	{
 		result.m_bEncrypted = true;
