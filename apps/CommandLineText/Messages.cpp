@@ -121,13 +121,26 @@ void DeliverHeld(VInbox& io_rInbox)
 	io_rInbox.m_Held.clear();
 }
 
+/// What a library calls an error though all goes on without it is a warning: an error ends the command.
+int LevelHere(const std::string& i_rCategory, int i_Level, std::string_view i_Text)
+{
+	constexpr std::pair<const char*, std::string_view> c_Harmless[] = {{"Import", ""}, {"FilesystemWatcher", ""},
+	    {"FBXIO", "Invalid transform for: "}, {"FBXIO", "Missing bone "},
+	    {"VSkinCache", "Folders of skins are not watched"}};
+	for (const auto& [pCategory, begin] : c_Harmless)
+		if (i_rCategory == pCategory && i_Text.starts_with(begin))
+			return std::max<int>(i_Level, NVX::ELogWarning);
+	return i_Level;
+}
+
 void Receive(const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rText)
 {
+	const int level = LevelHere(i_rCategory.Name(), i_Level, i_rText);
 	VInbox& rInbox = Inbox();
 	const std::lock_guard lock(rInbox.m_Mutex);
 	if (!rInbox.m_bHold)
-		return Deliver(rInbox, {&i_rCategory, i_Level, i_rText});
-	rInbox.m_Held.push_back({&i_rCategory, i_Level, i_rText});
+		return Deliver(rInbox, {&i_rCategory, level, i_rText});
+	rInbox.m_Held.push_back({&i_rCategory, level, i_rText});
 	if (rInbox.m_Held.size() > c_MaximumHeld)
 		DeliverHeld(rInbox);
 }
@@ -261,19 +274,43 @@ void TellFailure(EExitStatus i_Status, const std::string& i_rText)
 	Deliver(rInbox, {&rCategory, NVX::ELogError, i_rText}, i_Status);
 }
 
-void RequireNoWarnings()
+void RequireNoErrors()
 {
 	ReleaseMessages();
 	VInbox& rInbox = Inbox();
-	std::size_t count = 0;
+	std::size_t errors = 0;
+	std::size_t warnings = 0;
 	{
 		const std::lock_guard lock(rInbox.m_Mutex);
-		if (rInbox.m_Settings.m_bStrict)
-			count = std::exchange(rInbox.m_Warnings, 0) + std::exchange(rInbox.m_Errors, 0);
+		errors = std::exchange(rInbox.m_Errors, 0);
+		warnings = std::exchange(rInbox.m_Warnings, 0);
+		if (!rInbox.m_Settings.m_bStrict)
+			warnings = 0;
 	}
-	if (count > 0)
+	if (errors > 0)
+		throw VCommandError(EBadInput,
+		    "Nothing is written after an error, and what is shown may be wrong: mend what the errors above tell of");
+	if (warnings > 0)
 		throw VCommandError(EFindings,
-		    "--strict: " + std::to_string(count) + (count == 1 ? " warning counts" : " warnings count") + " as errors");
+		    "--strict: " + std::to_string(warnings) + (warnings == 1 ? " warning counts" : " warnings count")
+		        + " as errors");
+}
+
+void ForgiveErrors()
+{
+	ReleaseMessages();
+	VInbox& rInbox = Inbox();
+	const std::lock_guard lock(rInbox.m_Mutex);
+	rInbox.m_Warnings += std::exchange(rInbox.m_Errors, 0);
+}
+
+void ForgetCounts()
+{
+	ReleaseMessages();
+	VInbox& rInbox = Inbox();
+	const std::lock_guard lock(rInbox.m_Mutex);
+	rInbox.m_Errors = 0;
+	rInbox.m_Warnings = 0;
 }
 
 } // namespace CommandLine

@@ -77,9 +77,15 @@ void ForgetMessages(const std::function<bool(const std::string& i_rCategory, con
 /// the command line itself is wrong.
 void TellFailure(EExitStatus i_Status, const std::string& i_rText);
 
-/// With --strict, throws VCommandError with EFindings if a warning or an error has been told since the last call.
-/// Tells what waits. To be
-/// called before something is written, and at the end.
-void RequireNoWarnings();
+/// Tells what waits. Then throws VCommandError if an error has been told since the last call (EBadInput), and with
+/// --strict if a warning has (EFindings). To be called before something is written, and at the end of a command that
+/// calls itself fine.
+void RequireNoErrors();
+
+/// Tells what waits, and lets errors count as warnings from here on: the user has said that they are no matter.
+void ForgiveErrors();
+
+/// Tells what waits, and lets none of it count: it is of a file of many that has failed by itself.
+void ForgetCounts();
 
 } // namespace CommandLine

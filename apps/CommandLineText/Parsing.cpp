@@ -113,6 +113,13 @@ CLI::Validator OneOf(const std::vector<std::string>& i_rTexts)
 	    "");
 }
 
+CLI::Validator NotEmpty()
+{
+	return CLI::Validator([](const std::string& i_rText) -> std::string
+	    { return i_rText.empty() ? "the text is empty: give a name, or leave the option out" : ""; },
+	    "");
+}
+
 void AddMessageOptions(CLI::App& io_rApp, const std::shared_ptr<VMessageSettings>& i_rpSettings)
 {
 	io_rApp

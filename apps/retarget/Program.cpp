@@ -30,6 +30,7 @@ constexpr const char* c_pWalkThrough =
     "  retarget edit hero.qrr --source performer.qrs --rotation Head:Head --weight 0=2 -o hero.qrr\n"
     "\n"
     "Results go to standard output, messages to standard error as \"level category: text\".\n"
+    "One of the files that are read may be -, standard input; of what is written, - is standard output.\n"
     "Exit status: 0 fine; 1 findings; 2 wrong usage; 3 input that cannot be read or is invalid; 4 output that cannot "
     "be written.\nA command that fails writes nothing. Units are millimetres and radians.\n"
     "\"retarget COMMAND --help\" tells the options of a command with examples.";
@@ -149,7 +150,9 @@ int Run(std::vector<std::string> i_Arguments, const VRender& i_rRender)
 		pMessages = ShowMessages(*program.m_pMessages);
 		HoldMessages();
 		const EExitStatus status = RunParsed(program);
-		RequireNoWarnings();
+		if (status == EFine)
+			RequireNoErrors();
+		ReleaseMessages();
 		return status;
 	}
 	catch (const VCommandError& rError)

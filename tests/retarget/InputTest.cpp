@@ -92,6 +92,77 @@ TEST_F(Input, OutputThatCannotBeWritten)
 	    m_Folder);
 }
 
+TEST_F(Input, FromStandardInput)
+{
+	const std::vector<std::string> create{"create", "--source", c_Performer, "--rotation", "Head:Head", "--fbx"};
+	const auto with = [&](std::vector<std::string> i_Line, const std::vector<std::string>& i_rMore)
+	{
+		i_Line.insert(i_Line.end(), i_rMore.begin(), i_rMore.end());
+		return i_Line;
+	};
+	ASSERT_EQ(m_Folder.Run(with(create, {c_Fbx, "-o", "x.qrr"})).m_Status, 0);
+	struct VCase
+	{
+		std::vector<std::string> m_Line;
+		std::string m_File;
+	};
+	for (const VCase& rCase : {VCase{{"dump"}, "x.qrr"}, {{"dump", "--evaluated"}, "x.qrr"}, {{"fk"}, "x.qrr"},
+	         {{"segments"}, "x.qrr"}, {{"check"}, "x.qrr"}, {{"bones"}, c_Fbx}, {{"fbx", "--skin"}, c_Fbx},
+	         {{"targets", "--source", c_Performer}, "x.qrr"}, {{"targets", "x.qrr", "--source"}, c_Performer},
+	         {{"edit", "--scale", "2", "-o", "-"}, "x.qrr"}, {{"convert"}, "x.qrr"}})
+	{
+		SCOPED_TRACE(rCase.m_Line.front());
+		const std::vector<std::string> behind =
+		    rCase.m_Line.front() == "convert" ? std::vector<std::string>{"-"} : std::vector<std::string>();
+		const VRun piped = m_Folder.Run(with(with(rCase.m_Line, {"-"}), behind), rCase.m_File);
+		EXPECT_EQ(piped.m_Status, 0) << piped.m_Err;
+		EXPECT_GT(piped.m_Out.size(), 10u);
+		EXPECT_EQ(piped.m_Out, m_Folder.Run(with(with(rCase.m_Line, {rCase.m_File}), behind)).m_Out);
+	}
+	// The name of the descriptor goes into no subject.
+	EXPECT_EQ(m_Folder.Run(with(create, {"-", "-o", "-"}), c_Fbx).m_Out,
+	    Replaced((m_Folder / "x.qrr").string(), "<Skin NAME=\"own_ns_yup_cm_b7400\"/>", "<Skin/>"));
+	EXPECT_EQ(m_Folder.Run({"create", "--fbx", c_Fbx, "--source", "-", "-o", "-"}, c_Performer).m_Out.find("TEMPLATE="),
+	    std::string::npos);
+	RunRows(
+	    {
+	        {"nothing", {"dump", "-"}, 3, "", "\"-\" could not be read as a skeleton file"},
+	        {"no FBX", {"bones", "-"}, 3, "", "\"-\" could not be read as FBX", c_Performer},
+	        {"twice", {"targets", "-", "--source", "-"}, 2, "", "standard input holds only one", "x.qrr"},
+	        {"into a folder", {"convert", "-", "."}, 2, "", "standard input has no name under which", "x.qrr"},
+	        {"edits", {"edit", "x.qrr", "--edits", "-", "-o", "x.qrr"}, 3, "", "-:1: there is no edit", c_Performer},
+	        {"endless", {"dump", "-"}, 3, "", "it is larger than 33554432 bytes", "/dev/zero"},
+	        {"endless edits", {"edit", "x.qrr", "--edits", "/dev/zero", "-o", "x.qrr"}, 3, "", "larger than 16777216"},
+	    },
+	    m_Folder);
+}
+
+/// An error that a library tells ends no command with 0, and lets nothing be written.
+TEST_F(Input, ErrorsCount)
+{
+	m_Folder.Write(
+	    "state.qrr", Replaced(Data("qrt/version-3.5.qrs"), "POSITION=\"1*Scale 0 0\"", "POSITION=\"1*Scal 0 0\""));
+	m_Folder.Write("static.qrx",
+	    "{\"Version\":[1,0,1],\"Schema\":\"Retarget\"}\n{\"SubjectParametrised\":{\"StaticParameters\":[{\"Name\":"
+	    "\"a\",\"DefaultExpression\":\"b\"}],\"Segments\":[{\"Name\":\"Hips\"}]}}");
+	const std::string end = "error retarget: Nothing is written after an error, and what is shown may be wrong: ";
+	RunRows(
+	    {
+	        {"evaluated", {"dump", "--evaluated", "state.qrr"}, 3, "\"Subject\"", end},
+	        {"segments", {"segments", "state.qrr"}, 3, "Hips", end},
+	        {"targets", {"targets", "state.qrr"}, 3, "Point", end},
+	        {"fk", {"fk", "static.qrx"}, 3, "Hips", end},
+	        {"edit", {"edit", "state.qrr", "--weight", "1=2", "-o", "x.qrr"}, 3, "", end},
+	        {"legacy", {"edit", "static.qrx", "-o", "x.qrr"}, 3, "", end},
+	    },
+	    m_Folder);
+	const VRun mended = m_Folder.Run({"edit", "state.qrr", "--remove-target", "0", "-o", "x.qrr"});
+	EXPECT_EQ(mended.m_Status, 0) << mended.m_Err;
+	EXPECT_EQ(mended.m_Err.find("error"), std::string::npos) << mended.m_Err;
+	// One file's error is not another's.
+	EXPECT_EQ(m_Folder.Run({"convert", "static.qrx", "x.qrr", "."}).m_Out, "2 files: 1 converted, 1 not\n");
+}
+
 /// The file that is replaced is the one that was read, and a failure half-way leaves it.
 TEST_F(Input, AFailedEditLeavesTheFileAlone)
 {

@@ -23,14 +23,15 @@ std::map<std::string, std::string> VScratchFolder::Snapshot() const
 	return files;
 }
 
-VRun VScratchFolder::Run(const std::vector<std::string>& i_rArguments) const
+VRun VScratchFolder::Run(const std::vector<std::string>& i_rArguments, const std::string& i_rInput) const
 {
 	// Files take any amount of output without a reader.
 	const VTestFolder output;
-	std::string command = "cd '" + Path().string() + "' && exec '" RETARGET_PROGRAM "'";
+	std::string command =
+	    "cd '" + Path().string() + "' && cat '" + i_rInput + "' 2> /dev/null | '" RETARGET_PROGRAM "'";
 	for (const std::string& rArgument : i_rArguments)
 		command += " '" + boost::replace_all_copy(rArgument, "'", "'\\''") + "'";
-	command += " < /dev/null > '" + (output / "out").string() + "' 2> '" + (output / "err").string() + "'";
+	command += " > '" + (output / "out").string() + "' 2> '" + (output / "err").string() + "'";
 	const int status = std::system(command.c_str());
 	return {
 	    WIFEXITED(status) ? WEXITSTATUS(status) : 1000 + WTERMSIG(status), Get(output / "out"), Get(output / "err")};

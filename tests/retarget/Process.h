@@ -17,8 +17,8 @@ struct VRun
 class VScratchFolder : public VTestFolder
 {
 public:
-	/// With nothing on the program's standard input.
-	VRun Run(const std::vector<std::string>& i_rArguments) const;
+	/// @param i_rInput the file on the program's standard input, through a pipe
+	VRun Run(const std::vector<std::string>& i_rArguments, const std::string& i_rInput = "/dev/null") const;
 
 	void Write(const std::string& i_rName, const std::string& i_rText) const { Put(*this / i_rName, i_rText); }
 	std::string Read(const std::string& i_rName) const { return Get(*this / i_rName); }

@@ -119,12 +119,17 @@ TEST(Render, DrawsWhatThePreviewShows)
 	std::vector<std::string> skinned = bottom;
 	skinned.insert(skinned.end(), {"--skins", Data("fbx")});
 	EXPECT_EQ(folder.Run(skinned).m_Out, folder.Read("bottom.png"));
-	EXPECT_NE(folder.Run(bottom).m_Out, folder.Read("bottom.png")) << "bones alone";
+	const std::string bones = folder.Run(bottom).m_Out;
+	EXPECT_NE(bones, folder.Read("bottom.png")) << "bones alone";
+	std::vector<std::string> piped = bottom;
+	piped[2] = "-";
+	EXPECT_EQ(folder.Run(piped, "x.qrr").m_Out, bones);
 }
 
 TEST(Render, TellsWhatItLacks)
 {
 	const VSubjectFolder folder;
+	folder.Write(boost::filesystem::path(c_Fbx).filename().string(), Get(c_Fbx).substr(0, 5000));
 	const std::string noDisplay = "error retarget: There is no display to draw with: set DISPLAY";
 	const struct
 	{
@@ -138,6 +143,9 @@ TEST(Render, TellsWhatItLacks)
 	        {"no OpenGL", {"-q", "render", "x.qrr", "-o", "x.png"}, 4, "", "(offscreen) has no OpenGL to draw with"}},
 	    {"", "",
 	        {"files come first", {"render", "nowhere.qrr", "-o", "x.png"}, 3, "", "\"nowhere.qrr\" could not be read"}},
+	    {nullptr, nullptr,
+	        {"no such skin", {"render", "x.qrr", "--skins", ".", "-o", "x.png"}, 3, "",
+	            "error retarget: Nothing is written after an error"}},
 	    {nullptr, nullptr, {"no such folder", {"-q", "render", "x.qrr", "-o", "no/x.png"}, 4, "", "error retarget: "}},
 	};
 	for (const auto& rRow : rows)

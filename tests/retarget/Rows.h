@@ -17,6 +17,8 @@ struct VRow
 	std::string m_Out;
 	/// The same of the messages.
 	std::string m_Err;
+	/// On standard input.
+	std::string m_Input = "/dev/null";
 };
 
 /// Runs the rows; none may leave a file behind that was not there.
@@ -26,7 +28,7 @@ inline void RunRows(const std::vector<VRow>& i_rRows, const VScratchFolder& i_rF
 	{
 		SCOPED_TRACE(rRow.m_pName);
 		const std::vector<std::string> before = i_rFolder.Names();
-		const VRun run = i_rFolder.Run(rRow.m_Arguments);
+		const VRun run = i_rFolder.Run(rRow.m_Arguments, rRow.m_Input);
 		EXPECT_EQ(run.m_Status, rRow.m_Status) << run.m_Err;
 		if (rRow.m_Out.empty())
 			EXPECT_EQ(run.m_Out, "");

@@ -1,6 +1,7 @@
 #include "CommandLineText/Messages.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/SubjectFile.h"
+#include "retarget/text/InputFile.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/OutputFile.h"
 
@@ -51,7 +52,7 @@ void CheckKind(const VConversion& i_rConversion)
 	const VOutput& rOut = i_rConversion.m_Out;
 	CheckOutput(rOut, c_SkeletonFamilyFile);
 	boost::system::error_code error;
-	if (!rOut.m_bForce && rOut.m_Path != "-" && boost::filesystem::exists(rOut.m_Path, error)
+	if (!rOut.m_bForce && rOut.m_Path != c_pStandardStream && boost::filesystem::exists(rOut.m_Path, error)
 	    && LowerExtension(rOut.m_Path) != WrittenExtension(i_rConversion.m_In))
 		throw VCommandError(EBadOutput,
 		    "\"" + rOut.m_Path + "\" is there, and is of another kind than \"" + i_rConversion.m_In
@@ -64,6 +65,8 @@ void Convert(const VConvertSettings& i_rSettings, VConversion& io_rConversion)
 	const std::string& rIn = io_rConversion.m_In;
 	const VOutput& rOut = io_rConversion.m_Out;
 	const VSubjectFile file = ReadSubjectFile(rIn);
+	if (rOut.m_bForce)
+		ForgiveErrors();
 	const CoreOrlexTypes::VSubjectRecord& rRecord = file.m_Record;
 	const auto [losses, refusal] = CoreOrlexQRTIO::ListVersionLosses(
 	    rRecord.m_SubjectParametrised, rRecord.m_SubjectApplicationData, file.m_Extras, i_rSettings.m_Version);
@@ -97,6 +100,9 @@ std::vector<VConversion> Conversions(const VConvertSettings& i_rSettings)
 	std::set<std::string> names;
 	for (auto it = rPaths.begin(); it != rPaths.end() - 1; ++it)
 	{
+		if (bFolder && *it == c_pStandardStream)
+			throw VCommandError(EWrongUsage,
+			    "standard input has no name under which it could go into \"" + rOut + "\": name the file to write");
 		boost::filesystem::path out = rOut;
 		if (bFolder)
 			out /= boost::filesystem::path(*it).filename().replace_extension(WrittenExtension(*it));
@@ -127,6 +133,7 @@ EExitStatus ConvertAll(const VConvertSettings& i_rSettings)
 				throw;
 			status = std::max(status, rError.Status());
 			NVX_LOG(c_pCategory, NVX::ELogError, "\"%1%\" is not converted: %2%", rConversion.m_In, rError.what());
+			ForgetCounts();
 		}
 	}
 	const std::size_t count = conversions.size();

@@ -1,4 +1,5 @@
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/Parsing.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Edits.h"
 #include "retarget/subject/Session.h"
@@ -35,6 +36,7 @@ EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 		    "The bind pose as built differs from the pose in the file, %1%; --match-file-pose mends it",
 		    RetargetSetup::WorstText(session.Target(), *worst));
 	ApplyEdits(session, i_rEdits);
+	session.ForgetNamelessFiles();
 	session.Save(i_rSettings.m_Out.m_Path);
 	session.Report(i_rSettings.m_Out.m_Path);
 	return EFine;
@@ -56,7 +58,8 @@ VCommand AddCreateCommand(CLI::App& io_rProgram)
 	const auto pEdits = std::make_shared<VEdits>();
 	pApp->add_option("--fbx", pSettings->m_Fbx, "The character's FBX file")->option_text("FILE")->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton; adding and updating targets needs it")
-	    ->option_text("FILE.qrs");
+	    ->option_text("FILE.qrs")
+	    ->check(NotEmpty());
 	pApp->add_option("--root", pSettings->m_Root,
 	        "The bone that becomes the root, by name or by index in the file; the first bone if left out")
 	    ->option_text("NAME|INDEX");

@@ -40,8 +40,7 @@ VCommand AddDumpCommand(CLI::App& io_rProgram)
 	    {"dump performer.qrs", "dump hero.qrr | jq '.SubjectParametrised.Segments[].Name'",
 	        "dump --evaluated performer.qrs"});
 	const auto pSettings = std::make_shared<VDumpSettings>();
-	pApp->add_option("FILE", pSettings->m_File, "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)")
-	    ->required();
+	pApp->add_option("FILE", pSettings->m_File, c_pSkeletonFileHelp)->required();
 	pApp->add_flag("--evaluated", pSettings->m_bEvaluated, "With all expressions evaluated to numbers");
 	return {pApp, [pSettings] { return ShowSubject(*pSettings); }};
 }

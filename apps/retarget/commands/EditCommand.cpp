@@ -1,3 +1,4 @@
+#include "CommandLineText/Parsing.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Edits.h"
 #include "retarget/subject/Session.h"
@@ -40,9 +41,11 @@ VCommand AddEditCommand(CLI::App& io_rProgram)
 	        "edit hero.qrr --source performer.qrs --pose LeftArm=0,0,-1.2 --update-targets -o posed.qrr"});
 	const auto pSettings = std::make_shared<VEditSettings>();
 	const auto pEdits = std::make_shared<VEdits>();
-	pApp->add_option("IN.qrr", pSettings->m_In, "The retarget subject, or a legacy one (.qrx)")->required();
+	pApp->add_option("IN.qrr", pSettings->m_In, "The retarget subject, or a legacy one (.qrx); - is standard input")
+	    ->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton; adding and updating targets needs it")
-	    ->option_text("FILE.qrs");
+	    ->option_text("FILE.qrs")
+	    ->check(NotEmpty());
 	pApp->add_option("-o,--output", pSettings->m_Out.m_Path,
 	        "Where the retarget subject is saved; may be IN.qrr itself, - is standard output")
 	    ->option_text("OUT.qrr")

@@ -1,4 +1,5 @@
 #include "retarget/commands/Commands.h"
+#include "retarget/text/InputFile.h"
 #include "retarget/text/Output.h"
 
 #include "FBXIO/FBXReader.h"
@@ -140,7 +141,7 @@ EExitStatus ShowFbx(const VFbxSettings& i_rSettings)
 	FBXIO::VMeshRules rules = FBXIO::c_FaithfulMeshes;
 	rules.m_Pictures = FBXIO::EPictures::Heads;
 	reader.SetMeshRules(rules);
-	if (!reader.LoadFile(i_rSettings.m_File))
+	if (!reader.LoadFile(InputPath(i_rSettings.m_File).string()))
 		throw VCommandError(EBadInput, "\"" + i_rSettings.m_File + "\" could not be read as FBX");
 	VJson result = VJson::object();
 	result["upAxis"] = reader.GetUpAxis();
@@ -166,7 +167,7 @@ VCommand AddFbxCommand(CLI::App& io_rProgram)
 	    {"fbx hero.fbx", "fbx hero.fbx --meshes | jq -c '.placedMeshes[] | [.name, .vertexCount]'",
 	        "fbx hero.fbx --skin | jq '.skin.meshes'"});
 	const auto pSettings = std::make_shared<VFbxSettings>();
-	pApp->add_option("FILE", pSettings->m_File, "FBX file, binary or ASCII")->required();
+	pApp->add_option("FILE", pSettings->m_File, "FBX file, binary or ASCII; - is standard input")->required();
 	pApp->add_flag("--meshes", pSettings->m_bMeshes,
 	    "The meshes as they are drawn, with their places, bounds (least and greatest, mm), materials and textures");
 	pApp->add_flag("--skin", pSettings->m_bSkin,

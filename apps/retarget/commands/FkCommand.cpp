@@ -135,8 +135,7 @@ VCommand AddFkCommand(CLI::App& io_rProgram)
 	    "world, as JSON: rotations row by row, translations in millimetres",
 	    {"fk hero.qrr", "fk performer.qrs --pose tpose", "fk arm.qrs --state 0,0,0,0,0,1000,0.5"});
 	const auto pSettings = std::make_shared<VFkSettings>();
-	pApp->add_option("FILE", pSettings->m_File, "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)")
-	    ->required();
+	pApp->add_option("FILE", pSettings->m_File, c_pSkeletonFileHelp)->required();
 	pApp->add_option("--pose", pSettings->m_Pose, "Which of the poses in the file (default: bind)")
 	    ->option_text("bind|mean|tpose")
 	    ->check(OneOf({"bind", "mean", "tpose"}));

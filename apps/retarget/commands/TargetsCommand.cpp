@@ -1,5 +1,6 @@
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/Parsing.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Residuals.h"
 #include "retarget/subject/Session.h"
@@ -193,9 +194,11 @@ VCommand AddTargetsCommand(CLI::App& io_rProgram)
 	    {"targets hero.qrr", "targets hero.qrr --source performer.qrs",
 	        "targets hero.qrr --source performer.qrs --json | jq '.[] | select(.distance > 1)'"});
 	const auto pSettings = std::make_shared<VTargetsSettings>();
-	pApp->add_option("FILE.qrr", pSettings->m_File, "The retarget subject, or a legacy one (.qrx)")->required();
+	pApp->add_option("FILE.qrr", pSettings->m_File, "The retarget subject, or a legacy one (.qrx); - is standard input")
+	    ->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton, for the residuals")
-	    ->option_text("FILE.qrs");
+	    ->option_text("FILE.qrs")
+	    ->check(NotEmpty());
 	pApp->add_flag("--states", pSettings->m_bStates,
 	    "With the names and states of the targets, which are shown by themselves where the terminal is wide enough");
 	return {pApp, [pSettings] { return ShowTargets(*pSettings); }};

@@ -2,6 +2,7 @@
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Residuals.h"
 #include "retarget/subject/SubjectFile.h"
+#include "retarget/text/InputFile.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/Table.h"
 
@@ -49,7 +50,7 @@ const char* SideText(const std::string& i_rName)
 VTree ReadBones(const std::string& i_rPath)
 {
 	FBXIO::FBXReader reader;
-	if (!reader.LoadFile(i_rPath) || !reader.IsComplete())
+	if (!reader.LoadFile(InputPath(i_rPath).string()) || !reader.IsComplete())
 		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as FBX");
 	VTree tree;
 	if (!reader.HasSkeleton())
@@ -149,7 +150,7 @@ VCommand AddBonesCommand(CLI::App& io_rProgram)
 	    "Show the bones of an FBX file as a tree: index, name, length in mm from the parent, and side",
 	    {"bones hero.fbx"});
 	const auto pFile = std::make_shared<std::string>();
-	pApp->add_option("FILE.fbx", *pFile, "FBX file, binary or ASCII")->required();
+	pApp->add_option("FILE.fbx", *pFile, "FBX file, binary or ASCII; - is standard input")->required();
 	return {pApp,
 	    [pFile]
 	    {
@@ -166,7 +167,7 @@ VCommand AddSegmentsCommand(CLI::App& io_rProgram)
 	    "of joint (Dummy: none), and what it follows by the targets of a retarget subject",
 	    {"segments performer.qrs", "segments hero.qrr"});
 	const auto pFile = std::make_shared<std::string>();
-	pApp->add_option("FILE", *pFile, "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)")->required();
+	pApp->add_option("FILE", *pFile, c_pSkeletonFileHelp)->required();
 	return {pApp,
 	    [pFile]
 	    {

@@ -111,7 +111,7 @@ void Save(const QImage& i_rPicture, const std::string& i_rPath)
 	std::string error = "The picture could not be made";
 	const bool bMade = i_rPicture.save(&buffer, "PNG");
 	const std::string_view content(bytes.constData(), std::size_t(bytes.size()));
-	RequireNoWarnings();
+	RequireNoErrors();
 	if (bMade && i_rPath == "-")
 		Print(content);
 	else if (!bMade

@@ -51,11 +51,14 @@ VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender)
 	        "render hero.qrr -o - >hero.png"});
 	const auto pSettings = std::make_shared<VRenderSettings>();
 	pSettings->m_View = c_Views.front();
-	pApp->add_option("FILE.qrr", pSettings->m_In, "The retarget subject, or a legacy one (.qrx)")->required();
+	pApp->add_option("FILE.qrr", pSettings->m_In, "The retarget subject, or a legacy one (.qrx); - is standard input")
+	    ->required();
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton, to be drawn with it")
-	    ->option_text("FILE.qrs");
+	    ->option_text("FILE.qrs")
+	    ->check(NotEmpty());
 	pApp->add_option("--skins", pSettings->m_Skins, "Where the target's FBX lies, whose skin is drawn on the bones")
-	    ->option_text("FOLDER");
+	    ->option_text("FOLDER")
+	    ->check(NotEmpty());
 	std::string views;
 	for (const char* pView : c_Views)
 		views += (views.empty() ? "" : "|") + std::string(pView);

@@ -28,12 +28,17 @@ EExitStatus RunRenderer(const std::vector<std::string>& i_rArguments)
 	QStringList arguments;
 	for (const std::string& rArgument : i_rArguments)
 		arguments << QFile::decodeName(rArgument.c_str());
-	const int status = QProcess::execute(program, arguments);
-	if (status < 0)
-		throw VCommandError(EBadOutput,
-		    status == -1 ? "The display's OpenGL failed while it drew; LIBGL_ALWAYS_SOFTWARE=1 draws without its driver"
-		                 : "\"" + program.toStdString() + "\" cannot be started");
-	return static_cast<EExitStatus>(status);
+	QProcess process;
+	process.setProcessChannelMode(QProcess::ForwardedChannels);
+	// The subject may come that way.
+	process.setInputChannelMode(QProcess::ForwardedInputChannel);
+	process.start(program, arguments);
+	if (!process.waitForFinished(-1))
+		throw VCommandError(EBadOutput, "\"" + program.toStdString() + "\" cannot be started");
+	if (process.exitStatus() == QProcess::CrashExit)
+		throw VCommandError(
+		    EBadOutput, "The display's OpenGL failed while it drew; LIBGL_ALWAYS_SOFTWARE=1 draws without its driver");
+	return static_cast<EExitStatus>(process.exitCode());
 }
 
 } // namespace CommandLine

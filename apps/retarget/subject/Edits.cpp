@@ -3,17 +3,20 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Suggest.h"
+#include "retarget/text/InputFile.h"
 
 #include "CoreOrlexTypes/JointType.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
+#include "NVX/Status.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
 #include "RetargetSetupDocument/SideOfName.h"
+#include "UtilsFileSystem/Files.h"
 #include "math/NumberText.h"
 
 #include <algorithm>
-#include <fstream>
-#include <iostream>
 #include <iterator>
+#include <sstream>
 
 namespace CommandLine
 {
@@ -277,16 +280,21 @@ std::string Trimmed(const std::string& i_rText)
 	return begin == std::string::npos ? "" : i_rText.substr(begin, i_rText.find_last_not_of(c_Blanks) + 1 - begin);
 }
 
+/// Thousands of edits for each segment that a subject may have; by mistake it is no text.
+constexpr std::size_t c_MaximumEditsBytes = 16u << 20;
+
 /// One edit a line, as on the command line but without quotes: what stands behind the option's name is its value,
 /// blanks and all. Empty lines and those that begin with "#" are passed over.
 void ReadEdits(const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
 {
-	std::ifstream file;
-	if (i_rPath != "-")
-		file.open(i_rPath);
-	std::istream& rStream = i_rPath == "-" ? std::cin : file;
+	std::string text;
+	std::string reason;
+	if (UtilsFileSystem::ReadWholeFile(InputPath(i_rPath, c_MaximumEditsBytes), c_MaximumEditsBytes, text, reason)
+	    != NVX::Status::c_Success)
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a file of edits: " + reason);
+	std::istringstream stream(std::move(text));
 	std::size_t number = 0;
-	for (std::string line; std::getline(rStream, line);)
+	for (std::string line; std::getline(stream, line);)
 	{
 		++number;
 		line = Trimmed(line);
@@ -310,8 +318,16 @@ void ReadEdits(const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
 			    where + name + (value.empty() ? std::string(" needs a value: ") + pKind->m_pValue : " takes no value"));
 		io_rEdits.push_back({pKind, value, where});
 	}
-	if (number == 0 && !rStream.eof())
-		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a file of edits");
+}
+
+/// What was told at loading and behind each edit of expressions that do not evaluate is forgotten for what is true of
+/// the target subject in the end. Of a performer only states of targets can fail, which nothing here asks for.
+void TellExpressionsAgain(const VRetargetSetup& i_rDocument)
+{
+	ForgetMessages([](const std::string& i_rCategory, const std::string&) { return i_rCategory == "SubjectUtils"; });
+	CoreOrlexTypes::VSubject subject;
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(
+	    *i_rDocument.TargetValues().m_pParametrised, subject);
 }
 
 } // namespace
@@ -379,6 +395,7 @@ void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
 		}
 		io_rSession.Settle();
 	}
+	TellExpressionsAgain(io_rSession.Document());
 	const std::vector<std::string>& rWithoutPartner = io_rSession.m_WithoutPartner;
 	const bool bPartial = io_rSession.m_bAllowPartial;
 	for (const std::string& rSentence : rWithoutPartner)

@@ -3,16 +3,18 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
 #include "retarget/subject/SubjectFile.h"
+#include "retarget/text/InputFile.h"
 #include "retarget/text/Output.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
-#include "CoreOrlexQRTIO/Writer.h"
+#include "CoreOrlexQRTIO/Limits.h"
 #include "DebugServices/GlobalLog.h"
 #include "FBXIO/FBXReader.h"
 #include "InMemoryHost/Flow.h"
 #include "NVX/Status.h"
 #include "RetargetSetupDocument/BindPose.h"
 #include "RetargetSetupDocument/TargetConstruction.h"
+#include "UtilsFileSystem/Files.h"
 
 #include <boost/filesystem/operations.hpp>
 
@@ -55,11 +57,12 @@ VSession::VSession()
 
 void VSession::LoadSource(const std::string& i_rPath)
 {
-	if (!m_pDocument->LoadSourceSubject(i_rPath, ""))
+	if (!m_pDocument->LoadSourceSubject(InputPath(i_rPath, CoreOrlexQRTIO::c_MaximumFileSize), ""))
 		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a source skeleton");
 	Settle();
+	m_bSourceNamed = i_rPath != c_pStandardStream;
 	const auto pData = m_pDocument->TargetValues().m_pApplicationData;
-	if (pData && !pData->m_RetargetSourceTemplate.empty()
+	if (m_bSourceNamed && pData && !pData->m_RetargetSourceTemplate.empty()
 	    && pData->m_RetargetSourceTemplate != m_pDocument->GetSourceName())
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "The retarget subject was made for the source \"%1%\", not for \"%2%\"",
 		    pData->m_RetargetSourceTemplate, m_pDocument->GetSourceName());
@@ -67,7 +70,7 @@ void VSession::LoadSource(const std::string& i_rPath)
 
 void VSession::LoadTarget(const std::string& i_rPath)
 {
-	const std::uint32_t status = m_pDocument->LoadTargetSubject(i_rPath);
+	const std::uint32_t status = m_pDocument->LoadTargetSubject(InputPath(i_rPath, CoreOrlexQRTIO::c_MaximumFileSize));
 	if (status == NVX::Status::c_NewerFileVersion)
 		throw VCommandError(EBadInput, "\"" + i_rPath + "\" is of a later version than this program reads");
 	if (status == NVX::Status::c_FileNotOpened)
@@ -79,7 +82,7 @@ void VSession::LoadTarget(const std::string& i_rPath)
 
 void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot)
 {
-	if (!m_pDocument->LoadTargetFBX(i_rPath))
+	if (!m_pDocument->LoadTargetFBX(InputPath(i_rPath)))
 		throw VCommandError(EBadInput,
 		    m_pDocument->IsTargetFBXComplete() ? "\"" + i_rPath + "\" could not be read as FBX, or holds no skeleton"
 		                                       : "\"" + i_rPath + "\" could be read only in part");
@@ -90,6 +93,7 @@ void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std:
 		        + " bones up to where it broke off");
 	if (i_rRoot)
 		m_pDocument->SetTargetRootIndex(std::uint32_t(FindRoot(*i_rRoot, *pSkeleton)));
+	m_bTargetNamed = i_rPath != c_pStandardStream;
 	m_pDocument->CreateTargetSubject();
 	Settle();
 }
@@ -105,27 +109,42 @@ void VSession::Report(const std::string& i_rPath) const
 	    "");
 }
 
+void VSession::ForgetNamelessFiles()
+{
+	const auto values = m_pDocument->TargetValues();
+	CoreOrlexTypes::VSubjectApplicationData data = *values.m_pApplicationData;
+	if (!m_bTargetNamed)
+		data.m_Skin.clear();
+	if (!m_bSourceNamed)
+		data.m_RetargetSourceTemplate.clear();
+	if (data != *values.m_pApplicationData)
+		m_pDocument->SetTargetSubject(*values.m_pParametrised, data, m_pDocument->GetTargetExtras());
+}
+
 void VSession::Save(const std::string& i_rPath)
 {
-	if (StrictAsked() && i_rPath != "-")
+	const bool bStandardOutput = i_rPath == c_pStandardStream;
+	std::uint32_t status = NVX::Status::c_Success;
+	std::string text;
+	if (StrictAsked() || bStandardOutput)
 	{
 		// What saving would warn of is known only from a save.
 		boost::system::error_code error;
 		const boost::filesystem::path trial = boost::filesystem::temp_directory_path(error)
 		    / boost::filesystem::unique_path("retarget-%%%%%%%%%%%%.qrr", error);
-		m_pDocument->SaveTargetSubject(trial);
+		status = m_pDocument->SaveTargetSubject(trial);
+		std::string reason;
+		if (status == NVX::Status::c_Success && bStandardOutput)
+			status = UtilsFileSystem::ReadWholeFile(trial, text.max_size() / 2, text, reason);
 		boost::filesystem::remove(trial, error);
 	}
-	RequireNoWarnings();
-	if (i_rPath == "-")
-	{
-		const auto values = m_pDocument->TargetValues();
-		WriteSubjectFile(i_rPath, *values.m_pParametrised, *values.m_pApplicationData, m_pDocument->GetTargetExtras(),
-		    CoreOrlexQRTIO::c_AutomaticVersion);
-		return;
-	}
-	if (m_pDocument->SaveTargetSubject(i_rPath) != NVX::Status::c_Success)
+	RequireNoErrors();
+	if (!bStandardOutput)
+		status = m_pDocument->SaveTargetSubject(i_rPath);
+	if (status != NVX::Status::c_Success)
 		throw VCommandError(EBadOutput, "\"" + i_rPath + "\" could not be written");
+	if (bStandardOutput)
+		Print(text);
 	NVX_LOG(c_pCategory, NVX::ELogInformation, "Saved \"%1%\": %2% segments, %3% targets", i_rPath,
 	    Target().m_Segments.size(), Target().m_Targets.size());
 }

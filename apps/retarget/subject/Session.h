@@ -34,6 +34,10 @@ public:
 	/// EFindings with --strict, and nothing written, if there has been a warning or saving would bring one.
 	void Save(const std::string& i_rPath);
 
+	/// A subject that was made of standard input holds no name of that file: to be called before it is saved, since the
+	/// document knows the file by a name until then.
+	void ForgetNamelessFiles();
+
 	/// What the document asks its host for.
 	TesselPluginInterface::VHostRules& Rules() { return m_pApplication->m_Rules; }
 	/// With --json: where the subject was saved and what it holds.
@@ -66,6 +70,9 @@ private:
 	std::shared_ptr<InMemoryHost::VApplication> m_pApplication;
 	std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher;
 	std::shared_ptr<VRetargetSetup> m_pDocument;
+	/// False where it came from standard input.
+	bool m_bSourceNamed = true;
+	bool m_bTargetNamed = true;
 };
 
 /// World poses of all segments of a subject in its bind pose, in mm; empty, which is told, if it has no

@@ -3,8 +3,10 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
 #include "retarget/subject/Session.h"
+#include "retarget/text/InputFile.h"
 #include "retarget/text/Output.h"
 
+#include "CoreOrlexQRTIO/Limits.h"
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexQRTIO/Writer.h"
 #include "DebugServices/GlobalLog.h"
@@ -31,8 +33,9 @@ bool TryReadSubjectFile(const std::string& i_rPath, VSubjectFile& o_rFile)
 		return true;
 	}
 	CoreOrlexQRTIO::VReader reader(/*i_bNamespacesAreDetails*/ true);
-	return reader.Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId,
-	    o_rFile.m_Record.m_SubjectParametrised, o_rFile.m_Record.m_SubjectApplicationData, o_rFile.m_Extras);
+	return reader.Read(InputPath(i_rPath, CoreOrlexQRTIO::c_MaximumFileSize), RetargetSetup::c_SubjectName,
+	    RetargetSetup::c_SubjectId, o_rFile.m_Record.m_SubjectParametrised, o_rFile.m_Record.m_SubjectApplicationData,
+	    o_rFile.m_Extras);
 }
 
 VSubjectFile ReadSubjectFile(const std::string& i_rPath)
@@ -58,8 +61,8 @@ void WriteSubjectFile(const std::string& i_rPath, const CoreOrlexTypes::VSubject
 		NVX_LOG("QRTIO", NVX::ELogError, "%1%", rError);
 	if (!bWritten)
 		throw VCommandError(EBadOutput, "The subject could not be written");
-	RequireNoWarnings();
-	if (i_rPath == "-")
+	RequireNoErrors();
+	if (i_rPath == c_pStandardStream)
 		return Print(text);
 	std::string reason;
 	if (UtilsFileSystem::SaveFile(UtilsFileSystem::PathFromUtf8(i_rPath), text, reason) != NVX::Status::c_Success)

@@ -11,6 +11,10 @@ namespace CommandLine
 /// Of the legacy text form, which is only read.
 inline constexpr const char* c_LegacyExtension = ".qrx";
 
+/// What help says of a file that any command reads.
+inline constexpr const char* c_pSkeletonFileHelp =
+    "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx); - is standard input";
+
 /// What a file of the skeleton family holds.
 struct VSubjectFile
 {
