@@ -1,3 +1,4 @@
+#include "NVX/SelectionItemVariant.h"
 #include "OrlexGraphics/item/SceneFramebufferRenderer.h"
 #include "ViewFixture.h"
 

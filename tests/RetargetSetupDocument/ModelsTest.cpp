@@ -1,4 +1,4 @@
-#include "NVX/ISelectionItem.h"
+#include "NVX/SelectionItemVariant.h"
 #include "RetargetSetupDocument/RetargetSetupSegmentModel.h"
 #include "RetargetSetupDocument/RetargetSetupTargetModel.h"
 #include "RetargetSetupDocument/RoleNames.h"

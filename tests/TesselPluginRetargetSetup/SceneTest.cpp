@@ -1,6 +1,6 @@
 #include "../CoreGraphics/OffscreenContext.h"
 #include "InMemoryHost/Application.h"
-#include "NVX/ISelectionItem.h"
+#include "NVX/SelectionItemVariant.h"
 #include "OrlexGraphics/frame/FrameRenderer.h"
 #include "OrlexGraphics/manipulator/RenderManipulator.h"
 #include "RetargetSetupDocument/Identity.h"

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "NVX/SelectionItemVariant.h"
 #include "NVX/Signal.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 

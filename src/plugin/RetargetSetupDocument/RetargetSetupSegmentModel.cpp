@@ -1,6 +1,6 @@
 #include "RetargetSetupDocument/RetargetSetupSegmentModel.h"
 
-#include "NVX/ISelectionItem.h"
+#include "NVX/SelectionItemVariant.h"
 #include "RetargetSetupDocument/RoleNames.h"
 
 #include <QtQml>

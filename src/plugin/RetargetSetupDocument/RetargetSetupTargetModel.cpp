@@ -1,6 +1,6 @@
 #include "RetargetSetupDocument/RetargetSetupTargetModel.h"
 
-#include "NVX/ISelectionItem.h"
+#include "NVX/SelectionItemVariant.h"
 #include "RetargetSetupDocument/RetargetTargets.h"
 #include "RetargetSetupDocument/RoleNames.h"
 

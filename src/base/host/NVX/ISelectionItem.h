@@ -1,7 +1,5 @@
 #pragma once
 
-#include <QMetaType>
-
 #include <cstdint>
 #include <string>
 
@@ -28,5 +26,3 @@ enum ESelectionKind : std::uint32_t
 };
 
 } // namespace NVX
-
-Q_DECLARE_METATYPE(NVX::ISelectionItem)

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "NVX/ISelectionItem.h"
+#include "NVX/SelectionItemVariant.h"
 
 #include <QObject>
 #include <QPointF>
