@@ -4,9 +4,12 @@
 
 /// Thin wrappers of the LAPACK routines in use. Matrices are row by row. A result other than 0 is the routine's: above
 /// 0 it did not converge, below 0 an argument was bad; -5 and -6 stand for a matrix that is not finite, which the
-/// routine never sees.
+/// routine never sees, and c_NotLoaded for LAPACK itself missing. It is loaded when it is called first.
 namespace Lapack
 {
+
+/// Told once in the log category "System".
+inline constexpr int c_NotLoaded = -1000;
 
 /// Doubles of work space that Dgesvd needs.
 constexpr std::size_t DgesvdWork(std::size_t i_Rows, std::size_t i_Columns)
