@@ -1,5 +1,6 @@
 #pragma once
 
+#include "../tests/Matrices.h"
 #include "Ratios.h"
 
 #include "InMemoryHost/PluginContext.h"
@@ -26,9 +27,9 @@ public:
 		{
 			bones[i].m_Name = "Character:Segment" + std::to_string(i);
 			bones[i].m_ParentIndex = (std::int64_t(i) - 1) / 4 - (i == 0 ? 1 : 0);
-			bones[i].m_PreRotation.rotate(number(random), 1, 0, 0);
-			bones[i].m_Local.translate(number(random), number(random), number(random));
-			bones[i].m_Local.rotate(number(random), 0, 1, 0);
+			Turn(bones[i].m_PreRotation, number(random), 1, 0, 0);
+			Move(bones[i].m_Local, number(random), number(random), number(random));
+			Turn(bones[i].m_Local, number(random), 0, 1, 0);
 		}
 		CoreOrlexTypes::VSubjectParametrised subject;
 		CoreOrlexTypes::VSubjectApplicationData data;

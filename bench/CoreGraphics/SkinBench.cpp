@@ -1,5 +1,7 @@
+#include "../../tests/Matrices.h"
 #include "../Ratios.h"
 
+#include "CoreGraphics/QtForm.h"
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "CoreGraphics/Skin.h"
@@ -32,12 +34,12 @@ struct VBench
 			FBXIO::VSkinBone& rBone = (*pSkeleton)[i];
 			rBone.m_Name = "bone" + std::to_string(i);
 			rBone.m_ParentIndex = static_cast<std::int64_t>(i) - 1;
-			rBone.m_Local.translate(10, 20, 30);
-			rBone.m_InverseBind.rotate(static_cast<float>(i), 1, 2, 3);
-			rBone.m_InverseBind.translate(-10, -20, -30);
+			Move(rBone.m_Local, 10, 20, 30);
+			Turn(rBone.m_InverseBind, static_cast<float>(i), 1, 2, 3);
+			Move(rBone.m_InverseBind, -10, -20, -30);
 			m_Poses.emplace_back().rotate(static_cast<float>(3 * i), 3, 2, 1);
 			m_Poses.back().translate(10, 20, 30);
-			m_Binds.push_back(rBone.m_InverseBind);
+			m_Binds.push_back(CoreGraphics::ToQt(rBone.m_InverseBind));
 			names.push_back(rBone.m_Name);
 		}
 		data.m_pSkeleton = std::move(pSkeleton);

@@ -1,6 +1,8 @@
 #include "CoreGraphics/SkinInstance.h"
 
+#include "../Matrices.h"
 #include "../UtilsFileSystem/Log.h"
+#include "CoreGraphics/QtForm.h"
 #include "CoreGraphics/Skin.h"
 
 #include <gtest/gtest.h>
@@ -8,6 +10,7 @@
 namespace
 {
 
+using CoreGraphics::ToQt;
 using CoreGraphics::VSkin;
 using CoreGraphics::VSkinInstance;
 using FBXIO::VSkinSkeleton;
@@ -28,7 +31,7 @@ VSkinSkeleton Skeleton(const std::vector<VBone>& i_rBones)
 		FBXIO::VSkinBone& rAdded = skeleton.emplace_back();
 		rAdded.m_Name = rBone.m_pName;
 		rAdded.m_ParentIndex = rBone.m_Parent;
-		rAdded.m_Local.translate(rBone.m_Offset);
+		Move(rAdded.m_Local, rBone.m_Offset.x(), rBone.m_Offset.y(), rBone.m_Offset.z());
 		rAdded.m_AccumulatedScale = rBone.m_AccumulatedScale;
 	}
 	return skeleton;
@@ -138,9 +141,9 @@ TEST(SkinInstance, BonesFollowThePose)
 	    {"Arm", 1, {200, 0, 0}, 2.0f}, {"Sleeve", 2, {30, 0, 0}}, {"Cuff", 3, {0, 20, 0}}, {"Leg", 1, {0, 0, -100}}});
 	for (std::size_t i = 0; i < skeleton.size(); ++i)
 	{
-		skeleton[i].m_Local.rotate(20.0f * static_cast<float>(i), 1, 2, 3);
-		skeleton[i].m_InverseBind.rotate(50.0f, 0, static_cast<float>(i), 1);
-		skeleton[i].m_InverseBind.translate(7, 8, 9);
+		Turn(skeleton[i].m_Local, 20.0f * static_cast<float>(i), 1, 2, 3);
+		Turn(skeleton[i].m_InverseBind, 50.0f, 0, static_cast<float>(i), 1);
+		Move(skeleton[i].m_InverseBind, 7, 8, 9);
 	}
 	VSkinInstance instance;
 	instance.Bind(Skin(skeleton), {"Hips", "Head", "Arm", "Leg"}, {{}, {1, 0, 0}, {300, 300, 0}, {0, 0, -100}});
@@ -163,13 +166,13 @@ TEST(SkinInstance, BonesFollowThePose)
 		expected[bone].scale(skeleton[bone].m_AccumulatedScale);
 		expected[bone].scale(instance.BoneScales()[bone]);
 	}
-	expected[0] = skeleton[0].m_Local;
-	expected[3] = expected[2] * skeleton[3].m_Local;
-	expected[4] = expected[3] * skeleton[4].m_Local;
+	expected[0] = ToQt(skeleton[0].m_Local);
+	expected[3] = expected[2] * ToQt(skeleton[3].m_Local);
+	expected[4] = expected[3] * ToQt(skeleton[4].m_Local);
 	EXPECT_NE(instance.BoneScales()[1], QVector3D(1, 1, 1));
 	for (std::size_t bone = 0; bone < expected.size(); ++bone)
 	{
-		expected[bone] = expected[bone] * skeleton[bone].m_InverseBind;
+		expected[bone] = expected[bone] * ToQt(skeleton[bone].m_InverseBind);
 		expected[bone](3, 3) = bone == 2 ? 0.25f : 1.0f;
 		for (std::size_t i = 0; i < 16; ++i)
 			EXPECT_NEAR(instance.BoneMatrices()[bone][i], expected[bone].constData()[i], 1e-3f) << bone << " " << i;
@@ -195,7 +198,7 @@ TEST(SkinInstance, TellsWhatIsNotWhereTheSegmentsAre)
 	EXPECT_EQ(warnings({"Hips", "Arm"}), VLines()) << "nothing is turned";
 	EXPECT_EQ(warnings({"Pelvis", "Arms"}),
 	    VLines{"3 No bone of the skin Hero has the name of a segment: it stays where it was made"});
-	skeleton[2].m_PreRotation.rotate(30, 0, 0, 1);
+	Turn(skeleton[2].m_PreRotation, 30, 0, 0, 1);
 	EXPECT_EQ(warnings({"Hips", "Arm", "Sleeve"}), VLines()) << "a segment turns it back";
 	EXPECT_EQ(warnings({"Hips", "Arm"}),
 	    VLines{"3 The skin Hero may be shown twisted at bones that no segment drives and that have pre-rotations, or "

@@ -81,10 +81,10 @@ TEST_P(Reader, RotationSpaceMayBeForLimitsOnly)
 	const VSkinSkeleton& rBones = *file.m_Reader.GetSkeleton();
 	ASSERT_EQ(rBones.size(), 3u);
 	EXPECT_NE(rBones[1].m_Global, rBones[0].m_Global);
-	EXPECT_FALSE(rBones[1].m_PreRotation.isIdentity());
+	EXPECT_NE(rBones[1].m_PreRotation, Rotation::VMatrix4());
 	EXPECT_EQ(rBones[2].m_Global, rBones[0].m_Global);
 	EXPECT_EQ(rBones[2].m_Local, rBones[0].m_Local);
-	EXPECT_TRUE(rBones[2].m_PreRotation.isIdentity());
+	EXPECT_EQ(rBones[2].m_PreRotation, Rotation::VMatrix4());
 }
 
 TEST(Reader, WhatIsNoPlainFileIsNotFound)
@@ -194,10 +194,10 @@ TEST_P(Reader, TransformsThatAreNotFiniteBecomeTheIdentity)
 	    (VMessages{invalid("a"), invalid("a"), invalid("b"), invalid("c"), invalid("c"), invalid("c"), invalid("d"),
 	        invalid("d")}));
 	const VSkinSkeleton& rBones = *loaded.m_Reader.GetSkeleton();
-	EXPECT_TRUE(rBones[0].m_Global.isIdentity());
+	EXPECT_EQ(rBones[0].m_Global, Rotation::VMatrix4());
 	EXPECT_EQ(rBones[1].m_Local(0, 3), 50.0f);
-	EXPECT_TRUE(rBones[2].m_PreRotation.isIdentity());
-	EXPECT_TRUE(rBones[3].m_Global.isIdentity());
+	EXPECT_EQ(rBones[2].m_PreRotation, Rotation::VMatrix4());
+	EXPECT_EQ(rBones[3].m_Global, Rotation::VMatrix4());
 }
 
 TEST_P(Reader, ProgressRisesAndCanEndTheImport)

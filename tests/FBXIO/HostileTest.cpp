@@ -1,11 +1,8 @@
 #include "../UtilsFileSystem/Log.h"
 #include "MeshFile.h"
+#include "Pictures.h"
 #include "SmallFiles.h"
 #include "SoundScene.h"
-
-#include <QBuffer>
-#include <QImage>
-#include <QtEndian>
 
 #include <gtest/gtest.h>
 #include <libdeflate.h>
@@ -115,13 +112,17 @@ const std::string& PackedTexts()
 {
 	static const std::string s_File = []
 	{
-		QBuffer buffer;
-		QImage(8, 8, QImage::Format_RGB32).save(&buffer, "PNG");
 		std::string text = "zTXtkey"s + '\0' + '\0' + Deflate(std::string(7'900'000, 'a'));
-		const auto bigEndian = [](std::size_t i_Number) { return Bytes(qToBigEndian(quint32(i_Number))); };
+		const auto bigEndian = [](std::size_t i_Number)
+		{
+			std::string bytes;
+			for (int shift = 24; shift >= 0; shift -= 8)
+				bytes += char(i_Number >> shift);
+			return bytes;
+		};
 		text = bigEndian(text.size() - 4) + text + bigEndian(libdeflate_crc32(0, text.data(), text.size()));
 		// Behind the head and its chunk.
-		return buffer.data().toStdString().insert(33, Repeated(40, [&](std::size_t) { return text; }));
+		return PngOf(8, 8).insert(33, Repeated(40, [&](std::size_t) { return text; }));
 	}();
 	return s_File;
 }

@@ -1,6 +1,7 @@
 #include "MeshFile.h"
 
-#include <QByteArray>
+#include <boost/archive/iterators/base64_from_binary.hpp>
+#include <boost/archive/iterators/transform_width.hpp>
 
 #include <algorithm>
 
@@ -8,6 +9,14 @@ using namespace FbxTest;
 
 namespace
 {
+
+std::string Base64(const std::string& i_rBytes)
+{
+	using namespace boost::archive::iterators;
+	using VIterator = base64_from_binary<transform_width<std::string::const_iterator, 6, 8>>;
+	std::string text(VIterator(i_rBytes.begin()), VIterator(i_rBytes.end()));
+	return text.append((4 - text.size() % 4) % 4, '=');
+}
 
 VTestValue Integers(const VNumbers& i_rNumbers)
 {
@@ -100,11 +109,11 @@ void AddMaterials(const VTestForm& i_rForm, const VTestValue& i_rNode, VObjects&
 		if (!rMaterial.m_Content.empty())
 		{
 			// As text in two pieces.
-			const QByteArray text = QByteArray::fromStdString(rMaterial.m_Content).toBase64();
+			const std::string text = Base64(rMaterial.m_Content);
 			VTestRecord content = Record("Content",
 			    {VRaw{i_rForm.m_Form == EForm::Binary
 			            ? Bytes('R', std::uint32_t(rMaterial.m_Content.size()), rMaterial.m_Content)
-			            : '"' + text.left(8).toStdString() + "\",\n\"" + text.mid(8).toStdString() + '"'}});
+			            : '"' + text.substr(0, 8) + "\",\n\"" + text.substr(8) + '"'}});
 			io_rObjects.Connect(io_rObjects.Add("Video", "video" + name, "Clip",
 			                        {Record("Filename", {rMaterial.m_FileName}), std::move(content)}),
 			    texture);

@@ -352,7 +352,7 @@ TEST_P(Mesh, PlaceThatIsNotFiniteIsTheIdentity)
 	std::vector<VPlacedMesh> placed;
 	reader.ReadPlacedMeshes(placed);
 	ASSERT_EQ(placed.size(), 1u);
-	EXPECT_TRUE(placed[0].m_Transform.isIdentity());
+	EXPECT_EQ(placed[0].m_Transform, Rotation::VMatrix4());
 	EXPECT_EQ(Told(m_Log), (VMessages{"2 Invalid transform for: body; setting to identity"}));
 }
 

@@ -41,7 +41,8 @@ class ReferenceFile : public testing::TestWithParam<std::string>
 protected:
 	/// Rotations and scalings to 1e-4, translations to 0.01 mm or 1e-5 of their size; of the small files, whose numbers
 	/// are exact, to a hundredth of that.
-	void ExpectMatrix(const QMatrix4x4& i_rMatrix, const nlohmann::json& i_rExpected, const std::string& i_rWhat)
+	void ExpectMatrix(
+	    const Rotation::VMatrix4& i_rMatrix, const nlohmann::json& i_rExpected, const std::string& i_rWhat)
 	{
 		const double part = GetParam().starts_with("cases/") ? 0.01 : 1.0;
 		for (int i = 0; i < 16; ++i)
@@ -81,7 +82,7 @@ TEST_P(ReferenceFile, BonesAgree)
 		ExpectMatrix(rBone.m_PreRotation, rBones[i]["preRotation"], rBone.m_Name + " pre-rotation");
 		ExpectMatrix(rBone.m_Local, rBones[i]["local"], rBone.m_Name + " local");
 		ExpectMatrix(rBone.m_Global, rBones[i]["global"], rBone.m_Name + " global");
-		EXPECT_TRUE(rBone.m_InverseBind.isIdentity());
+		EXPECT_EQ(rBone.m_InverseBind, Rotation::VMatrix4());
 	}
 }
 
@@ -122,8 +123,7 @@ TEST_P(ReferenceFile, PlacedMeshesAgree)
 		float bounds[6]{inf, inf, inf, -inf, -inf, -inf};
 		for (const VBasicVertex& rVertex : rMesh.m_Vertices)
 		{
-			const auto& [x, y, z] = rVertex.m_Position;
-			const QVector3D point = placed[i].m_Transform.map(QVector3D(x, y, z));
+			const std::array<float, 3> point = placed[i].m_Transform.Map(rVertex.m_Position);
 			for (int axis = 0; axis < 3; ++axis)
 			{
 				bounds[axis] = std::min(bounds[axis], point[axis]);
@@ -177,7 +177,7 @@ TEST_P(ReferenceFile, SkinsAgree)
 	for (std::size_t i = 0; i < skin.m_pSkeleton->size(); ++i)
 	{
 		EXPECT_LT((*skin.m_pSkeleton)[i].m_ParentIndex, std::int64_t(i));
-		bound += (*skin.m_pSkeleton)[i].m_InverseBind.isIdentity() ? 0 : 1;
+		bound += (*skin.m_pSkeleton)[i].m_InverseBind == Rotation::VMatrix4() ? 0 : 1;
 	}
 	EXPECT_LE(bound, reference["clusters"]);
 	// Clusters without control points bind nothing: the file has 32 lists of them for its 45 clusters.
@@ -198,17 +198,18 @@ TEST_P(ReferenceFile, SkinsAgree)
 INSTANTIATE_TEST_SUITE_P(Files, ReferenceFile, testing::ValuesIn(Files()),
     [](const auto& i_rInfo) { return i_rInfo.param.substr(i_rInfo.param.find('/') + 1); });
 
+bool AreNear(const Rotation::VMatrix4& i_rA, const Rotation::VMatrix4& i_rB)
+{
+	float most = 0.0f;
+	for (int i = 0; i < 16; ++i)
+		most = std::max(most, std::abs(i_rA(i / 4, i % 4) - i_rB(i / 4, i % 4)));
+	return most < 0.001f;
+}
+
 void ExpectEqual(const VSkin (&i_rSkins)[2])
 {
 	ASSERT_EQ(i_rSkins[0].m_Meshes.size(), i_rSkins[1].m_Meshes.size());
 	ASSERT_EQ(i_rSkins[0].m_pSkeleton->size(), i_rSkins[1].m_pSkeleton->size());
-	const auto near = [](const QMatrix4x4& i_rA, const QMatrix4x4& i_rB)
-	{
-		float most = 0.0f;
-		for (int i = 0; i < 16; ++i)
-			most = std::max(most, std::abs(i_rA(i / 4, i % 4) - i_rB(i / 4, i % 4)));
-		return most < 0.001f;
-	};
 	for (std::size_t i = 0; i < i_rSkins[0].m_pSkeleton->size(); ++i)
 	{
 		const VSkinBone& rA = (*i_rSkins[0].m_pSkeleton)[i];
@@ -217,7 +218,7 @@ void ExpectEqual(const VSkin (&i_rSkins)[2])
 		EXPECT_EQ(rA.m_ParentIndex, rB.m_ParentIndex);
 		for (const auto member :
 		    {&VSkinBone::m_PreRotation, &VSkinBone::m_InverseBind, &VSkinBone::m_Local, &VSkinBone::m_Global})
-			EXPECT_TRUE(near(rA.*member, rB.*member)) << rA.m_Name;
+			EXPECT_TRUE(AreNear(rA.*member, rB.*member)) << rA.m_Name;
 	}
 	for (std::size_t i = 0; i < i_rSkins[0].m_Meshes.size(); ++i)
 	{
@@ -227,7 +228,8 @@ void ExpectEqual(const VSkin (&i_rSkins)[2])
 		for (std::size_t part = 0; part < rA.m_Parts.size(); ++part)
 		{
 			EXPECT_EQ(rA.m_Parts[part].m_Indices, rB.m_Parts[part].m_Indices);
-			EXPECT_TRUE(qFuzzyCompare(rA.m_Parts[part].m_Diffuse, rB.m_Parts[part].m_Diffuse));
+			for (int k = 0; k < 4; ++k)
+				EXPECT_FLOAT_EQ(rA.m_Parts[part].m_Diffuse[k], rB.m_Parts[part].m_Diffuse[k]);
 		}
 		ASSERT_EQ(rA.m_Vertices.size(), rB.m_Vertices.size());
 		for (std::size_t vertex = 0; vertex < rA.m_Vertices.size(); ++vertex)
@@ -278,7 +280,7 @@ TEST(ReferenceTwins, OfOldVersionsReadToTheSameValues)
 	{
 		const VPlacedMesh& rA = meshes[0][i];
 		const VPlacedMesh& rB = meshes[1][i];
-		EXPECT_TRUE(qFuzzyCompare(rA.m_Transform, rB.m_Transform)) << i;
+		EXPECT_TRUE(AreNear(rA.m_Transform, rB.m_Transform)) << i;
 		ASSERT_EQ(rA.m_Mesh.m_Vertices.size(), rB.m_Mesh.m_Vertices.size());
 		for (std::size_t vertex = 0; vertex < rA.m_Mesh.m_Vertices.size(); ++vertex)
 			for (int axis = 0; axis < 3; ++axis)
@@ -332,17 +334,18 @@ TEST_P(FileInItsBindPose, SkinnedPointsLieWhereTheMeshLies)
 	float worst = 0;
 	for (const VSkinVertex& rVertex : rVertices)
 	{
-		const auto& [x, y, z] = rVertex.m_Position;
-		QVector3D skinned;
+		std::array<float, 3> skinned{};
 		float sum = 0;
 		for (int k = 0; k < 4; ++k)
 		{
 			const VSkinBone& rBone = (*skin.m_pSkeleton)[rVertex.m_BoneIndices[k]];
-			skinned += rVertex.m_BoneWeights[k] * (rBone.m_Global * rBone.m_InverseBind).map(QVector3D(x, y, z));
+			const auto point = (rBone.m_Global * rBone.m_InverseBind).Map(rVertex.m_Position);
+			for (int axis = 0; axis < 3; ++axis)
+				skinned[axis] += rVertex.m_BoneWeights[k] * point[axis];
 			sum += rVertex.m_BoneWeights[k];
 		}
-		const QVector3D place = placed[0].m_Transform.map(QVector3D(x, y, z));
-		worst = std::max(worst, (skinned / sum).distanceToPoint(place));
+		const auto [x, y, z] = placed[0].m_Transform.Map(rVertex.m_Position);
+		worst = std::max(worst, std::hypot(skinned[0] / sum - x, skinned[1] / sum - y, skinned[2] / sum - z));
 	}
 	EXPECT_LT(worst, 0.01f);
 }
@@ -364,7 +367,7 @@ TEST(DemoCharacter, IsReadWithoutAWarning)
 	EXPECT_EQ(log.Take(), std::vector<std::string>{"4 Loading file " + c_Folder + c_Demo + ".fbx"});
 	ASSERT_EQ(skin.m_pSkeleton->size(), 39u);
 	for (const VSkinBone& rBone : *skin.m_pSkeleton)
-		EXPECT_FALSE(rBone.m_InverseBind.isIdentity()) << rBone.m_Name;
+		EXPECT_NE(rBone.m_InverseBind, Rotation::VMatrix4()) << rBone.m_Name;
 }
 
 } // namespace

@@ -1,3 +1,4 @@
+#include "../Matrices.h"
 #include "../UtilsFileSystem/Log.h"
 
 #include "FBXIO/FBXReader.h"
@@ -171,15 +172,15 @@ TEST_P(Skin, SkeletonIsOfUsedBonesWithAllAboveAndBelow)
 	{
 		EXPECT_EQ((*skin.m_pSkeleton)[i].m_Name, expected[i].first);
 		EXPECT_EQ((*skin.m_pSkeleton)[i].m_ParentIndex, expected[i].second);
-		EXPECT_EQ((*skin.m_pSkeleton)[i].m_InverseBind.isIdentity(), i != 1);
+		EXPECT_EQ((*skin.m_pSkeleton)[i].m_InverseBind == Rotation::VMatrix4(), i != 1);
 	}
-	QMatrix4x4 bind;
-	bind.translate(0, -50, 20);
+	Rotation::VMatrix4 bind;
+	Move(bind, 0, -50, 20);
 	EXPECT_EQ((*skin.m_pSkeleton)[1].m_InverseBind, bind) << "in millimetres";
 	EXPECT_EQ(skin.m_Meshes.size(), 2u);
 	EXPECT_EQ(skin.m_Meshes[0].m_Vertices[0].m_BoneIndices[0], 1);
 	ASSERT_EQ(m_pFull->size(), 6u) << "the reader's own skeleton stays";
-	EXPECT_TRUE((*m_pFull)[3].m_InverseBind.isIdentity());
+	EXPECT_EQ((*m_pFull)[3].m_InverseBind, Rotation::VMatrix4());
 }
 
 TEST_P(Skin, ClustersOfUnevenListsKeepThePairs)

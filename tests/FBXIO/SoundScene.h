@@ -17,10 +17,9 @@ bool AreFinite(const TNumbers& i_rNumbers)
 	    std::begin(i_rNumbers), std::end(i_rNumbers), [](float i_Number) { return std::isfinite(i_Number); });
 }
 
-inline bool IsFinite(const QMatrix4x4& i_rMatrix)
+inline bool IsFinite(const Rotation::VMatrix4& i_rMatrix)
 {
-	return std::all_of(
-	    i_rMatrix.constData(), i_rMatrix.constData() + 16, [](float i_Entry) { return std::isfinite(i_Entry); });
+	return std::all_of(i_rMatrix.data(), i_rMatrix.data() + 16, [](float i_Entry) { return std::isfinite(i_Entry); });
 }
 
 inline std::string UnsoundBone(const FBXIO::VSkinSkeleton& i_rSkeleton)
@@ -29,7 +28,7 @@ inline std::string UnsoundBone(const FBXIO::VSkinSkeleton& i_rSkeleton)
 	{
 		if (rBone.m_ParentIndex < -1 || rBone.m_ParentIndex >= &rBone - i_rSkeleton.data())
 			return "the parent of " + rBone.m_Name + " does not stand before it";
-		for (const QMatrix4x4* const pMatrix :
+		for (const Rotation::VMatrix4* const pMatrix :
 		    {&rBone.m_PreRotation, &rBone.m_InverseBind, &rBone.m_Local, &rBone.m_Global})
 			if (!IsFinite(*pMatrix))
 				return "a matrix of " + rBone.m_Name + " is not finite";
@@ -44,11 +43,10 @@ std::string UnsoundMesh(const FBXIO::VMesh<TVertex>& i_rMesh, std::size_t i_Bone
 		return "a mesh has no part";
 	for (const FBXIO::VMeshPart& rPart : i_rMesh.m_Parts)
 	{
-		for (const QVector4D& rColour : {rPart.m_Emissive, rPart.m_Ambient, rPart.m_Diffuse, rPart.m_Specular,
-		         rPart.m_Transparent, rPart.m_Reflection, QVector4D(rPart.m_Shininess, 0, 0, 0)})
-			for (int i = 0; i < 4; ++i)
-				if (!std::isfinite(rColour[i]))
-					return "a colour is not finite";
+		for (const FBXIO::VColourAndFactor& rColour : {rPart.m_Emissive, rPart.m_Ambient, rPart.m_Diffuse,
+		         rPart.m_Specular, rPart.m_Transparent, rPart.m_Reflection, {rPart.m_Shininess}})
+			if (!AreFinite(rColour))
+				return "a colour is not finite";
 		if (rPart.m_IndexSize != (i_rMesh.m_Vertices.size() < 65536 ? 2 : 4)
 		    || rPart.m_Indices.size() % (3 * rPart.m_IndexSize) != 0)
 			return "the size of the indices is wrong";

@@ -1,5 +1,7 @@
 #include "RetargetSetupDocument/AngleAxis.h"
 
+#include "../Matrices.h"
+
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -11,40 +13,40 @@ namespace
 
 using Rotation::VVector3;
 
-QMatrix4x4 Turned(float i_Degrees, float i_X, float i_Y, float i_Z)
+Rotation::VMatrix4 Turned(float i_Degrees, float i_X, float i_Y, float i_Z)
 {
-	QMatrix4x4 matrix;
-	matrix.rotate(i_Degrees, i_X, i_Y, i_Z);
+	Rotation::VMatrix4 matrix;
+	Turn(matrix, i_Degrees, i_X, i_Y, i_Z);
 	return matrix;
 }
 
-QMatrix4x4 Scaled(QMatrix4x4 i_Matrix, float i_X, float i_Y, float i_Z)
+Rotation::VMatrix4 Scaled(Rotation::VMatrix4 i_Matrix, float i_X, float i_Y, float i_Z)
 {
-	i_Matrix.scale(i_X, i_Y, i_Z);
+	Scale(i_Matrix, i_X, i_Y, i_Z);
 	return i_Matrix;
 }
 
 TEST(MatrixToAngleAxis, Rows)
 {
-	QMatrix4x4 sheared;
+	Rotation::VMatrix4 sheared;
 	sheared(0, 1) = 0.5f;
 	// A column that leans by this angle leaves off-diagonal cosines c: 2 c c is the sum of squares that is tested.
 	const auto leaning = [](float i_Cosine)
 	{
-		QMatrix4x4 matrix;
+		Rotation::VMatrix4 matrix;
 		matrix(0, 1) = i_Cosine;
 		matrix(1, 1) = std::sqrt(1.0f - i_Cosine * i_Cosine);
 		return matrix;
 	};
-	QMatrix4x4 notANumber;
+	Rotation::VMatrix4 notANumber;
 	notANumber(1, 1) = std::numeric_limits<float>::quiet_NaN();
-	QMatrix4x4 moved = Turned(90, 1, 0, 0);
+	Rotation::VMatrix4 moved = Turned(90, 1, 0, 0);
 	moved(0, 3) = 1e6f;
 
 	const struct
 	{
 		const char* m_pName;
-		QMatrix4x4 m_Matrix;
+		Rotation::VMatrix4 m_Matrix;
 		bool m_bRotation;
 		VVector3 m_Expected;
 	} rows[] = {
@@ -80,11 +82,11 @@ TEST(AngleAxisToMatrix, IsTheWayBack)
 {
 	for (const VVector3& rVector : {VVector3{0, 0, 0}, {0.3, -0.2, 1.1}, {3.0, 0.5, 0.1}, {1e-17, 0, 0}})
 	{
-		const QMatrix4x4 matrix = RetargetSetup::AngleAxisToMatrix(rVector);
+		const Rotation::VMatrix4 matrix = RetargetSetup::AngleAxisToMatrix(rVector);
 		const VVector3 back = RetargetSetup::MatrixToAngleAxis(matrix);
 		for (std::size_t i = 0; i < 3; ++i)
 			EXPECT_NEAR(back[i], rVector[i], 2e-6);
-		EXPECT_EQ(matrix.column(3), QVector4D(0, 0, 0, 1));
+		EXPECT_EQ(matrix.Translation(), (std::array<float, 3>{}));
 	}
 }
 

@@ -22,23 +22,23 @@ FBXIO::VSkinSkeleton ScaledArm()
 {
 	FBXIO::VSkinSkeleton bones;
 	FBXIO::VSkinBone root = MakeBone("root", -1);
-	root.m_Global.translate(10, 20, 30);
-	root.m_Global.rotate(90, 0, 0, 1);
+	Move(root.m_Global, 10, 20, 30);
+	Turn(root.m_Global, 90, 0, 0, 1);
 	bones.push_back(root);
 
 	FBXIO::VSkinBone arm = MakeBone("arm", 0, 100, 0, 0);
-	arm.m_PreRotation.rotate(40, 0, 1, 0);
-	arm.m_Local.rotate(25, 1, 0, 0);
+	Turn(arm.m_PreRotation, 40, 0, 1, 0);
+	Turn(arm.m_Local, 25, 1, 0, 0);
 	arm.m_Global = root.m_Global;
-	arm.m_Global.translate(100, 0, 0);
-	arm.m_Global.rotate(70, 0.6f, 0, 0.8f);
-	arm.m_Global.scale(2);
+	Move(arm.m_Global, 100, 0, 0);
+	Turn(arm.m_Global, 70, 0.6f, 0, 0.8f);
+	Scale(arm.m_Global, 2, 2, 2);
 	bones.push_back(arm);
 
 	FBXIO::VSkinBone hand = MakeBone("hand", 1, 0, 50, 0);
 	hand.m_Global = arm.m_Global;
-	hand.m_Global.translate(0, 50, 0);
-	hand.m_Global.rotate(-30, 0, 1, 0);
+	Move(hand.m_Global, 0, 50, 0);
+	Turn(hand.m_Global, -30, 0, 1, 0);
 	bones.push_back(hand);
 	return bones;
 }
@@ -60,10 +60,10 @@ std::vector<Rotation::VPose<double>> BindPoses(const VSubjectParametrised& i_rSu
 	return pFK ? RetargetSetup::SegmentPoses(*pFK) : std::vector<Rotation::VPose<double>>();
 }
 
-QMatrix4x4 YUp()
+Rotation::VMatrix4 YUp()
 {
-	QMatrix4x4 axis;
-	axis.rotate(90, 1, 0, 0);
+	Rotation::VMatrix4 axis;
+	Turn(axis, 90, 1, 0, 0);
 	return axis;
 }
 
@@ -85,11 +85,11 @@ TEST(FilePose, PosesAreTurnedToZUpAndScaledFromTheRoot)
 TEST(FilePose, AMirroredBoneKeepsItsFirstTwoAxes)
 {
 	FBXIO::VSkinSkeleton bones{MakeBone("root", -1)};
-	bones[0].m_Global.scale(2, 3, -4);
-	const auto poses = RetargetSetup::PosesInFile(bones, QMatrix4x4(), 1.0);
+	Scale(bones[0].m_Global, 2, 3, -4);
+	const auto poses = RetargetSetup::PosesInFile(bones, Rotation::VMatrix4(), 1.0);
 	EXPECT_EQ(poses[0].R, Rotation::c_Identity3);
-	bones[0].m_Global.scale(0, 1, 1);
-	EXPECT_EQ(RetargetSetup::PosesInFile(bones, QMatrix4x4(), 1.0)[0].R, Rotation::c_Identity3)
+	Scale(bones[0].m_Global, 0, 1, 1);
+	EXPECT_EQ(RetargetSetup::PosesInFile(bones, Rotation::VMatrix4(), 1.0)[0].R, Rotation::c_Identity3)
 	    << "no direction at all";
 }
 
@@ -129,7 +129,8 @@ TEST(FilePose, MatchingAnotherSkeletonChangesNothing)
 {
 	VSubjectParametrised subject = BuildScaled(ScaledArm(), 1.0);
 	const VSubjectParametrised before = subject;
-	const RetargetSetup::VFileMatch match = RetargetSetup::MatchFilePose(subject, {MakeBone("root", -1)}, QMatrix4x4());
+	const RetargetSetup::VFileMatch match =
+	    RetargetSetup::MatchFilePose(subject, {MakeBone("root", -1)}, Rotation::VMatrix4());
 	EXPECT_TRUE(match.m_Lengths.empty());
 	EXPECT_TRUE(subject == before);
 }

@@ -114,17 +114,17 @@ TEST_F(Flow, TheRootTakesItsPlaceInAWorldWithZUp)
 	{
 		const char* m_pFile;
 		/// In the file's space.
-		QVector3D m_Up;
+		std::array<float, 3> m_Up;
 	} rows[] = {{"inch_x_up.fbx", {1, 0, 0}}, {"millimetre_y_up.fbx", {0, 1, 0}}, {"metre_z_up.fbx", {0, 0, 1}}};
 	for (const auto& rRow : rows)
 	{
 		ASSERT_TRUE(m_Document.LoadTargetFBX(c_Cases / rRow.m_pFile));
-		const QVector3D up = m_Document.GetTargetAxisMatrix().mapVector(rRow.m_Up);
-		EXPECT_NEAR((up - QVector3D(0, 0, 1)).length(), 0, 1e-6) << rRow.m_pFile;
+		const std::array<float, 3> up = m_Document.GetTargetAxisMatrix().MapVector(rRow.m_Up);
+		EXPECT_EQ(up, (std::array<float, 3>{0, 0, 1})) << rRow.m_pFile;
 		m_Document.CreateTargetSubject();
 		const std::vector<double> pose = Target().m_Segments[0].m_Joint.m_BindPose;
 		ASSERT_EQ(pose.size(), 6u);
-		const QMatrix4x4 world = m_Document.GetTargetAxisMatrix() * (*m_Document.GetFBXSkeleton())[0].m_Global;
+		const Rotation::VMatrix4 world = m_Document.GetTargetAxisMatrix() * (*m_Document.GetFBXSkeleton())[0].m_Global;
 		for (int row = 0; row < 3; ++row)
 			EXPECT_EQ(pose[std::size_t(3 + row)], double(world(row, 3)));
 		EXPECT_EQ(Target().m_Segments[0].m_Joint.m_Mean, pose);
@@ -140,7 +140,7 @@ TEST_F(Flow, ALaterRootDropsWhatStandsBefore)
 	ASSERT_EQ(Target().m_Segments.size(), 2u);
 	EXPECT_EQ(Target().m_Segments[0].m_Name, "middle");
 	EXPECT_EQ(m_Document.GetTargetScale(), 2.0);
-	const QMatrix4x4& rGlobal = (*m_Document.GetFBXSkeleton())[1].m_Global;
+	const Rotation::VMatrix4& rGlobal = (*m_Document.GetFBXSkeleton())[1].m_Global;
 	EXPECT_EQ(Target().m_Segments[0].m_Joint.m_BindPose[3], double(rGlobal(0, 3))) << "the place carries no scale";
 
 	VLogRecorder log;

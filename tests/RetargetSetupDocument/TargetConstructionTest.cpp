@@ -50,7 +50,7 @@ TEST(ExtractSubtree, Rows)
 TEST(ExtractSubtree, OnlyTheRootLosesItsPlace)
 {
 	const VSkinSkeleton subtree = ExtractSubtree({MakeBone("a", -1, 1), MakeBone("b", 0, 2), MakeBone("c", 1, 3)}, 1);
-	EXPECT_TRUE(subtree[0].m_Local.isIdentity());
+	EXPECT_EQ(subtree[0].m_Local, Rotation::VMatrix4());
 	EXPECT_EQ(subtree[1].m_Local(0, 3), 3.0f);
 }
 
@@ -79,9 +79,9 @@ TEST(BuildTargetSubject, SegmentsOfAChain)
 {
 	VSkinSkeleton bones = {
 	    MakeBone("rig:Hips", -1, 5, 6, 7), MakeBone("rig:Spine", 0, 250, 0, -0.5f), MakeBone("Head", 1, 0, 12.25f, 0)};
-	bones[0].m_PreRotation.rotate(90, 0, 0, 1);
-	bones[1].m_PreRotation.rotate(-90, 1, 0, 0);
-	bones[1].m_Local.rotate(90, 0, 1, 0);
+	Turn(bones[0].m_PreRotation, 90, 0, 0, 1);
+	Turn(bones[1].m_PreRotation, -90, 1, 0, 0);
+	Turn(bones[1].m_Local, 90, 0, 1, 0);
 	const auto [subject, data] = Build(bones);
 
 	ASSERT_EQ(subject.m_Segments.size(), 3u);
@@ -125,7 +125,7 @@ TEST(BuildTargetSubject, LengthsGrowWithTheScaleAboveTheBone)
 TEST(BuildTargetSubject, TellsARotationThatIsLost)
 {
 	VSkinSkeleton bones = {MakeBone("a", -1), MakeBone("mirrored", 0, 3)};
-	bones[1].m_Local.scale(-1, 1, 1);
+	Scale(bones[1].m_Local, -1, 1, 1);
 	VLogRecorder log;
 	const auto [subject, data] = Build(bones);
 	EXPECT_EQ(subject.m_Segments[1].m_Joint.m_BindPose, std::vector<double>(3));

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "../LogRecorder.h"
+#include "../Matrices.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "FBXIO/SkinSkeleton.h"
@@ -48,6 +49,6 @@ inline FBXIO::VSkinBone MakeBone(
 	FBXIO::VSkinBone bone;
 	bone.m_Name = i_pName;
 	bone.m_ParentIndex = i_Parent;
-	bone.m_Local.translate(i_X, i_Y, i_Z);
+	Move(bone.m_Local, i_X, i_Y, i_Z);
 	return bone;
 }

@@ -19,7 +19,7 @@ struct VFbxSettings
 	bool m_bSkin = false;
 };
 
-VJson MatrixToJson(const QMatrix4x4& i_rMatrix)
+VJson MatrixToJson(const Rotation::VMatrix4& i_rMatrix)
 {
 	VJson values = VJson::array();
 	for (int row = 0; row < 4; ++row)
@@ -46,24 +46,19 @@ VJson BonesToJson(const FBXIO::VSkinSkeleton& i_rSkeleton)
 	return bones;
 }
 
-VJson VectorToJson(const QVector4D& i_rVector)
-{
-	return {i_rVector.x(), i_rVector.y(), i_rVector.z(), i_rVector.w()};
-}
-
 VJson PartToJson(const FBXIO::VMeshPart& i_rPart)
 {
 	VJson part = VJson::object();
 	part["triangleCount"] = i_rPart.m_Indices.size() / (3 * i_rPart.m_IndexSize);
 	part["indexSize"] = i_rPart.m_IndexSize;
-	part["emissive"] = VectorToJson(i_rPart.m_Emissive);
-	part["ambient"] = VectorToJson(i_rPart.m_Ambient);
-	part["diffuse"] = VectorToJson(i_rPart.m_Diffuse);
-	part["specular"] = VectorToJson(i_rPart.m_Specular);
+	part["emissive"] = i_rPart.m_Emissive;
+	part["ambient"] = i_rPart.m_Ambient;
+	part["diffuse"] = i_rPart.m_Diffuse;
+	part["specular"] = i_rPart.m_Specular;
 	part["shininess"] = i_rPart.m_Shininess;
-	part["transparent"] = VectorToJson(i_rPart.m_Transparent);
-	part["reflection"] = VectorToJson(i_rPart.m_Reflection);
-	part["texture"] = i_rPart.m_TextureSize.isEmpty() ? VJson() : VJson(i_rPart.m_TexturePath);
+	part["transparent"] = i_rPart.m_Transparent;
+	part["reflection"] = i_rPart.m_Reflection;
+	part["texture"] = i_rPart.m_pTexture ? VJson(i_rPart.m_TexturePath) : VJson();
 	return part;
 }
 
@@ -73,19 +68,18 @@ VJson BoundsToJson(const FBXIO::VPlacedMesh& i_rPlaced)
 	if (i_rPlaced.m_Mesh.m_Vertices.empty())
 		return {};
 	constexpr float c_Infinity = std::numeric_limits<float>::infinity();
-	QVector3D least(c_Infinity, c_Infinity, c_Infinity);
-	QVector3D greatest = -least;
+	std::array<float, 3> least{c_Infinity, c_Infinity, c_Infinity};
+	std::array<float, 3> greatest{-c_Infinity, -c_Infinity, -c_Infinity};
 	for (const FBXIO::VBasicVertex& rVertex : i_rPlaced.m_Mesh.m_Vertices)
 	{
-		const auto& [x, y, z] = rVertex.m_Position;
-		const QVector3D point = i_rPlaced.m_Transform.map(QVector3D(x, y, z));
-		for (int axis = 0; axis < 3; ++axis)
+		const std::array<float, 3> point = i_rPlaced.m_Transform.Map(rVertex.m_Position);
+		for (std::size_t axis = 0; axis < 3; ++axis)
 		{
 			least[axis] = std::min(least[axis], point[axis]);
 			greatest[axis] = std::max(greatest[axis], point[axis]);
 		}
 	}
-	return {least.x(), least.y(), least.z(), greatest.x(), greatest.y(), greatest.z()};
+	return {least[0], least[1], least[2], greatest[0], greatest[1], greatest[2]};
 }
 
 VJson PlacedMeshesToJson(FBXIO::FBXReader& io_rReader)
@@ -138,9 +132,7 @@ VJson SkinToJson(FBXIO::FBXReader& io_rReader)
 EExitStatus ShowFbx(const VFbxSettings& i_rSettings)
 {
 	FBXIO::FBXReader reader;
-	FBXIO::VMeshRules rules = FBXIO::c_FaithfulMeshes;
-	rules.m_Pictures = FBXIO::EPictures::Heads;
-	reader.SetMeshRules(rules);
+	reader.SetMeshRules(FBXIO::c_FaithfulMeshes);
 	if (!reader.LoadFile(InputPath(i_rSettings.m_File).string()))
 		throw VCommandError(EBadInput, "\"" + i_rSettings.m_File + "\" could not be read as FBX");
 	VJson result = VJson::object();

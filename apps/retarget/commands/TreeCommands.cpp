@@ -61,9 +61,11 @@ VTree ReadBones(const std::string& i_rPath)
 		VTreeNode& rNode = tree.emplace_back();
 		rNode.m_Name = rBone.m_Name;
 		rNode.m_Parent = rBone.m_ParentIndex;
-		const auto place = [](const FBXIO::VSkinBone& i_rBone) { return i_rBone.m_Global.column(3).toVector3D(); };
-		if (rBone.m_ParentIndex >= 0)
-			rNode.m_Length = (place(rBone) - place(rSkeleton[std::size_t(rBone.m_ParentIndex)])).length();
+		if (rBone.m_ParentIndex < 0)
+			continue;
+		const auto [x, y, z] = rBone.m_Global.Translation();
+		const auto [parentX, parentY, parentZ] = rSkeleton[std::size_t(rBone.m_ParentIndex)].m_Global.Translation();
+		rNode.m_Length = std::hypot(x - parentX, y - parentY, z - parentZ);
 	}
 	return tree;
 }

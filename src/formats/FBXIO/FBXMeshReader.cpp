@@ -22,7 +22,7 @@ using namespace FBXIO;
 /// The number of polygon vertices from which indices need four bytes.
 constexpr std::size_t c_FirstLargeCount = 0x10000;
 
-QVector4D ColourAndFactor(const FbxPropertyT<FbxDouble3>& i_rColour, const FbxPropertyT<FbxDouble>& i_rFactor)
+VColourAndFactor ColourAndFactor(const FbxPropertyT<FbxDouble3>& i_rColour, const FbxPropertyT<FbxDouble>& i_rFactor)
 {
 	const FbxDouble3 colour = i_rColour.Get();
 	return {Finite(colour[0]), Finite(colour[1]), Finite(colour[2]), Finite(i_rFactor.Get())};
@@ -69,7 +69,7 @@ void ForEachCluster(FbxSkin& i_rSkin, TVisit&& i_Visit)
 constexpr float c_SeenDistance = 0.1f;
 constexpr float c_SeenTurn = 1e-3f;
 
-bool AreSeenToDiffer(const QMatrix4x4& i_rA, const QMatrix4x4& i_rB)
+bool AreSeenToDiffer(const Rotation::VMatrix4& i_rA, const Rotation::VMatrix4& i_rB)
 {
 	for (int row = 0; row < 3; ++row)
 		for (int column = 0; column < 4; ++column)
@@ -96,10 +96,14 @@ void FBXIO::FBXMeshReader::SetFile(const std::string& i_rPath, std::uint64_t i_B
 	m_Images.SetFileBytes(i_Bytes);
 }
 
+void FBXIO::FBXMeshReader::SetPictures(VOpenPicture i_pOpen)
+{
+	m_Images.SetOpener(i_pOpen);
+}
+
 void FBXIO::FBXMeshReader::SetRules(const VMeshRules& i_rRules)
 {
 	m_Rules = i_rRules;
-	m_Images.SetPictures(i_rRules.m_Pictures);
 	m_PartOfMaterial.clear();
 }
 
@@ -161,17 +165,20 @@ void FBXIO::FBXMeshReader::Prepare(FbxNode& i_rNode, FbxMesh& io_rFrom, VMesh<TV
 template <typename TVertex>
 void FBXIO::FBXMeshReader::FindGeometric(FbxNode& i_rNode, const FbxAMatrix& i_rPlace, const VMesh<TVertex>& i_rMesh)
 {
-	QMatrix4x4 moved = SystemMatrix(FbxAMatrix(i_rNode.GetGeometricTranslation(FbxNode::eSourcePivot),
+	Rotation::VMatrix4 moved = SystemMatrix(FbxAMatrix(i_rNode.GetGeometricTranslation(FbxNode::eSourcePivot),
 	    i_rNode.GetGeometricRotation(FbxNode::eSourcePivot), i_rNode.GetGeometricScaling(FbxNode::eSourcePivot)));
 	ScaleTranslation(moved, m_UnitScale);
-	if (moved.isIdentity())
+	if (moved == Rotation::VMatrix4())
 		return;
-	const QMatrix4x4 place = SystemMatrix(i_rPlace);
+	const Rotation::VMatrix4 place = SystemMatrix(i_rPlace);
 	float farthest = 0.0f;
 	for (const TVertex& rVertex : i_rMesh.m_Vertices)
 	{
-		const QVector3D point(rVertex.m_Position[0], rVertex.m_Position[1], rVertex.m_Position[2]);
-		farthest = std::max(farthest, place.mapVector(moved.map(point) - point).length());
+		std::array<float, 3> way = moved.Map(rVertex.m_Position);
+		for (int axis = 0; axis < 3; ++axis)
+			way[axis] -= rVertex.m_Position[axis];
+		const auto [x, y, z] = place.MapVector(way);
+		farthest = std::max(farthest, std::hypot(x, y, z));
 	}
 	m_Findings.m_Geometric += farthest >= c_SeenDistance ? 1 : 0;
 	m_Findings.m_GeometricDistance = std::max(m_Findings.m_GeometricDistance, farthest);
@@ -235,15 +242,12 @@ void FBXIO::FBXMeshReader::ReadMaterial(FbxSurfaceMaterial* i_pMaterial, VMeshPa
 		return;
 	const FbxFileTexture& rTexture = *pColour->GetSrcObject<FbxFileTexture>(0);
 	io_rPart.m_TexturePath = rTexture.GetFileName();
-	VCachedPicture picture =
+	io_rPart.m_pTexture =
 	    m_Images.Get(io_rPart.m_TexturePath + " (embedded)", [&rTexture] { return ContentOf(rTexture); });
-	if (picture.m_Size.isEmpty())
-	{
-		io_rPart.m_TexturePath = FindTexture(rTexture);
-		picture = m_Images.Get(io_rPart.m_TexturePath);
-	}
-	io_rPart.m_pTexture = std::move(picture.m_pImage);
-	io_rPart.m_TextureSize = picture.m_Size;
+	if (io_rPart.m_pTexture)
+		return;
+	io_rPart.m_TexturePath = FindTexture(rTexture);
+	io_rPart.m_pTexture = m_Images.Get(io_rPart.m_TexturePath);
 }
 
 std::string FBXIO::FBXMeshReader::FindTexture(const FbxFileTexture& i_rTexture) const
@@ -373,7 +377,7 @@ std::int64_t FBXIO::FBXMeshReader::BindBone(FbxCluster& i_rCluster)
 		pMatrix->SetT(translation);
 	}
 	VSkinBone& rBone = (*m_pSkeleton)[bone];
-	QMatrix4x4 inverseBind = SystemMatrix(link.Inverse() * transform);
+	Rotation::VMatrix4 inverseBind = SystemMatrix(link.Inverse() * transform);
 	CheckTransform(inverseBind, rBone.m_Name, m_Searched.insert(&i_rCluster).second);
 	if (!m_BoundBones.insert(bone).second && AreSeenToDiffer(inverseBind, rBone.m_InverseBind))
 		m_Findings.m_BoundDifferently.insert(bone);

@@ -29,6 +29,7 @@ public:
 	/// The skeleton whose bones clusters are found in; the last bone of each name.
 	void SetSkeleton(std::shared_ptr<VSkinSkeleton> i_pSkeleton);
 
+	void SetPictures(VOpenPicture i_pOpen);
 	void SetRules(const VMeshRules& i_rRules);
 
 	static bool IsMesh(FbxNode& i_rNode);

@@ -276,6 +276,11 @@ void FBXIO::FBXReader::SetProgress(VProgress i_Progress)
 	m_pImpl->m_Progress = std::move(i_Progress);
 }
 
+void FBXIO::FBXReader::SetPictures(VOpenPicture i_pOpen)
+{
+	m_pImpl->m_MeshReader.SetPictures(i_pOpen);
+}
+
 void FBXIO::FBXReader::SetMeshRules(const VMeshRules& i_rRules)
 {
 	m_pImpl->m_MeshReader.SetRules(i_rRules);

@@ -33,6 +33,9 @@ public:
 	using VProgress = std::function<bool(float)>;
 	void SetProgress(VProgress i_Progress);
 
+	/// Opens the pictures of textures that are read from now on; by default their heads are read alone.
+	void SetPictures(VOpenPicture i_pOpen);
+
 	/// For the meshes that are read from now on.
 	void SetMeshRules(const VMeshRules& i_rRules);
 

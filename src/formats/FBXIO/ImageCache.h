@@ -1,9 +1,7 @@
 #pragma once
 
 #include "FBXIO/Limits.h"
-#include "FBXIO/MeshRules.h"
-
-#include <QImage>
+#include "FBXIO/Picture.h"
 
 #include <cstdint>
 #include <functional>
@@ -14,16 +12,9 @@
 namespace FBXIO
 {
 
-/// A picture that was looked for: both empty if there is none.
-struct VCachedPicture
-{
-	/// Empty if only the head was read.
-	std::shared_ptr<const QImage> m_pImage;
-	QSize m_Size;
-};
-
-/// Images by the exact path that they were asked for with. Belongs to one thread at a time. What is beyond the limits
-/// for pictures is left out, told in the category "Import".
+/// Pictures by the exact path that they were asked for with. Belongs to one thread at a time. Those beyond the limits
+/// are left out, and so are files that cost more than their head tells: SVG, icons, and JPEG of very many scans. What
+/// is left out or damaged is told in the category "Import".
 class ImageCache
 {
 public:
@@ -31,23 +22,23 @@ public:
 	void SetFileBytes(std::uint64_t i_Bytes) { m_BytesLeftInFile = Limits::ImagesBytes(i_Bytes); }
 
 	/// Before the first picture.
-	void SetPictures(EPictures i_What) { m_What = i_What; }
+	void SetOpener(VOpenPicture i_pOpen) { m_pOpen = i_pOpen; }
 
-	/// Reads the file the first time. Empty if it is no image: told once in the category "Import".
-	VCachedPicture Get(const std::string& i_rPath);
+	/// Reads the file the first time. Null if it is no picture, which is told once.
+	std::shared_ptr<const VPicture> Get(const std::string& i_rPath);
 
 	/// The same of a picture that i_rRead gives the file of, under a name that is no path of a file.
-	VCachedPicture Get(const std::string& i_rName, const std::function<std::string()>& i_rRead);
+	std::shared_ptr<const VPicture> Get(const std::string& i_rName, const std::function<std::string()>& i_rRead);
 
 private:
-	/// Takes from io_rBytesLeft.
-	VCachedPicture Read(const QByteArray& i_rBytes, const QByteArray& i_rFormat, const std::string& i_rName,
+	/// Takes from io_rBytesLeft, before a picture turns out to be damaged: a file may hold any number of such ones.
+	std::shared_ptr<const VPicture> Read(std::string i_Bytes, const std::string& i_rFormat, const std::string& i_rName,
 	    std::uint64_t& io_rBytesLeft) const;
 
 	std::uint64_t m_BytesLeft = Limits::c_ImagesBytes;
 	std::uint64_t m_BytesLeftInFile = 0;
-	EPictures m_What = EPictures::All;
-	std::map<std::string, VCachedPicture> m_Images;
+	VOpenPicture m_pOpen = &OpenPictureHead;
+	std::map<std::string, std::shared_ptr<const VPicture>> m_Images;
 };
 
 } // namespace FBXIO

@@ -1,6 +1,6 @@
 #pragma once
 
-#include <QMatrix4x4>
+#include "numerics/Matrix4.h"
 
 #include <fbxsdk.h>
 
@@ -10,11 +10,11 @@ namespace FBXIO
 {
 
 /// A matrix of the SDK, which is stored for row vectors.
-QMatrix4x4 SystemMatrix(const FbxAMatrix& i_rMatrix);
+Rotation::VMatrix4 SystemMatrix(const FbxAMatrix& i_rMatrix);
 
 /// Makes a matrix with entries that are no numbers the identity, and tells the name if i_bTell.
-void CheckTransform(QMatrix4x4& io_rMatrix, const std::string& i_rName, bool i_bTell = true);
+void CheckTransform(Rotation::VMatrix4& io_rMatrix, const std::string& i_rName, bool i_bTell = true);
 
-void ScaleTranslation(QMatrix4x4& io_rMatrix, float i_Scale);
+void ScaleTranslation(Rotation::VMatrix4& io_rMatrix, float i_Scale);
 
 } // namespace FBXIO

@@ -1,10 +1,7 @@
 #pragma once
 
+#include "FBXIO/Picture.h"
 #include "FBXIO/SkinSkeleton.h"
-
-#include <QImage>
-#include <QMatrix4x4>
-#include <QVector4D>
 
 #include <array>
 #include <cstdint>
@@ -32,20 +29,22 @@ struct VSkinVertex : VBasicVertex
 };
 static_assert(sizeof(VSkinVertex) == 40);
 
-/// One material's share of a mesh. Colours have their factor in w.
+/// Red, green and blue, then the factor that they count with.
+using VColourAndFactor = std::array<float, 4>;
+
+/// One material's share of a mesh.
 struct VMeshPart
 {
-	QVector4D m_Emissive;
-	QVector4D m_Ambient;
-	QVector4D m_Diffuse{1.0f, 0.8f, 0.8f, 1.0f};
-	QVector4D m_Specular;
+	VColourAndFactor m_Emissive{};
+	VColourAndFactor m_Ambient{};
+	VColourAndFactor m_Diffuse{1.0f, 0.8f, 0.8f, 1.0f};
+	VColourAndFactor m_Specular{};
 	float m_Shininess = 0.0f;
-	QVector4D m_Transparent;
-	QVector4D m_Reflection;
-	/// Empty if there is none, or none that could be read, and if only the heads of pictures are.
-	std::shared_ptr<const QImage> m_pTexture;
-	/// In points; empty if there is none, or none that could be read.
-	QSize m_TextureSize;
+	VColourAndFactor m_Transparent{};
+	VColourAndFactor m_Reflection{};
+	/// Null if there is none, or none that could be read. What is known beyond its size is what the reader's opener of
+	/// pictures has left in it.
+	std::shared_ptr<const VPicture> m_pTexture;
 	/// The file that the texture was looked for in; empty if the material names none.
 	std::string m_TexturePath;
 	/// Bytes of one index, 2 or 4.
@@ -68,7 +67,7 @@ struct VPlacedMesh
 {
 	VBasicMesh m_Mesh;
 	/// Global transform for column vectors, translation in millimetres.
-	QMatrix4x4 m_Transform;
+	Rotation::VMatrix4 m_Transform;
 	/// The node's.
 	std::string m_Name;
 };

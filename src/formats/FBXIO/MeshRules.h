@@ -13,14 +13,6 @@ enum class EVertexKey
 	ControlPointAndUVIndex
 };
 
-/// What is read of the pictures of textures.
-enum class EPictures
-{
-	All,
-	/// Their heads alone: that they are there, and how large they are.
-	Heads
-};
-
 /// How meshes are read where a rule has a plain form and one that fits more files. The defaults are the plain forms.
 struct VMeshRules
 {
@@ -28,7 +20,6 @@ struct VMeshRules
 	/// A material that is neither Phong nor Lambert shows its base colour and the texture of that, under the names that
 	/// exporters give them; else it is drawn in the default.
 	bool m_bBaseColours = false;
-	EPictures m_Pictures = EPictures::All;
 };
 
 /// For programs that show a mesh as its file means it.

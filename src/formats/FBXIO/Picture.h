@@ -1,31 +1,45 @@
 #pragma once
 
-#include "FBXIO/MeshRules.h"
-
-#include <QByteArray>
-#include <QImage>
-
-#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
 
 namespace FBXIO
 {
 
+/// A picture of a texture, as large as its head promises, in points. Whoever opens its file may know more of it, such
+/// as its points.
 struct VPicture
 {
-	/// Null if the file holds no picture, or one that is left out, and if only the head was asked for.
-	QImage m_Image;
-	/// What its head promises, as far as that was read.
-	QSize m_Size;
-	/// Everything that was asked for could be read.
-	bool m_bSound = false;
-	/// Left out for its size.
-	bool m_bTooLarge = false;
+	virtual ~VPicture() = default;
+
+	int m_Width = 0;
+	int m_Height = 0;
 };
 
-/// Reads the file of a picture whose points, of four bytes or eight, are within c_ImageBytes and io_rBytesLeft, which
-/// pays for them. Left out are also files that cost more than their head tells: SVG, icons, and JPEG of very many
-/// scans.
-/// @param i_rFormat the extension of the file, for formats that cannot be told from their first bytes; may be empty.
-VPicture ReadPicture(QByteArray i_Bytes, const QByteArray& i_rFormat, EPictures i_What, std::uint64_t& io_rBytesLeft);
+/// The file of a picture: its head, and then the picture.
+class IPictureFile
+{
+public:
+	virtual ~IPictureFile() = default;
+
+	/// False if it has none. Both are above 0 otherwise.
+	virtual bool ReadHead(int& o_rWidth, int& o_rHeight) = 0;
+
+	/// Bytes of one point, at most, while it is read.
+	virtual int PointBytes() = 0;
+
+	/// Null if it is damaged. Once, after its head.
+	virtual std::shared_ptr<VPicture> Read() = 0;
+};
+
+/// Opens the bytes of a file, which must outlive what it returns; never null. Called on the thread of the reader, for
+/// files within the limits.
+/// @param i_rFormat the extension of the file in lower case, for formats that cannot be told from their first bytes;
+/// may be empty.
+using VOpenPicture = std::unique_ptr<IPictureFile> (*)(std::string_view i_Bytes, const std::string& i_rFormat);
+
+/// Reads heads alone, of PNG, JPEG, GIF, BMP and PNM: that a picture is there, and how large it is.
+std::unique_ptr<IPictureFile> OpenPictureHead(std::string_view i_Bytes, const std::string& i_rFormat);
 
 } // namespace FBXIO

@@ -1,6 +1,6 @@
 #pragma once
 
-#include <QMatrix4x4>
+#include "numerics/Matrix4.h"
 
 #include <cstdint>
 #include <string>
@@ -15,12 +15,12 @@ struct VSkinBone
 	/// As the file has it, namespace included, in UTF-8.
 	std::string m_Name;
 	/// The node's pre-rotation, rotation only.
-	QMatrix4x4 m_PreRotation;
+	Rotation::VMatrix4 m_PreRotation;
 	/// Identity until a skin cluster fills it.
-	QMatrix4x4 m_InverseBind;
+	Rotation::VMatrix4 m_InverseBind;
 	/// The node's local transform with its pre-rotation taken out on the right.
-	QMatrix4x4 m_Local;
-	QMatrix4x4 m_Global;
+	Rotation::VMatrix4 m_Local;
+	Rotation::VMatrix4 m_Global;
 	/// Index into the same array, -1 for a root.
 	std::int64_t m_ParentIndex = -1;
 	/// Product of the local X scalings from the scene root down to this node; the unit scale is not in it.

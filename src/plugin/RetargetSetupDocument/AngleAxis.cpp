@@ -22,7 +22,7 @@ bool IsRotation(const Rotation::VMatrix3& i_rMatrix)
 
 } // namespace
 
-std::optional<Rotation::VVector3> RotationOf(const QMatrix4x4& i_rMatrix)
+std::optional<Rotation::VVector3> RotationOf(const Rotation::VMatrix4& i_rMatrix)
 {
 	Rotation::VMatrix3 rotation;
 	for (int column = 0; column < 3; ++column)
@@ -39,15 +39,15 @@ std::optional<Rotation::VVector3> RotationOf(const QMatrix4x4& i_rMatrix)
 	return Rotation::CanonicalAngleAxis(Rotation::AngleAxisFromRotationMatrix(rotation));
 }
 
-Rotation::VVector3 MatrixToAngleAxis(const QMatrix4x4& i_rMatrix)
+Rotation::VVector3 MatrixToAngleAxis(const Rotation::VMatrix4& i_rMatrix)
 {
 	return RotationOf(i_rMatrix).value_or(Rotation::VVector3{});
 }
 
-QMatrix4x4 AngleAxisToMatrix(const Rotation::VVector3& i_rAngleAxis)
+Rotation::VMatrix4 AngleAxisToMatrix(const Rotation::VVector3& i_rAngleAxis)
 {
 	const Rotation::VMatrix3 rotation = Rotation::RotationMatrixFromAngleAxis(i_rAngleAxis);
-	QMatrix4x4 matrix;
+	Rotation::VMatrix4 matrix;
 	for (int row = 0; row < 3; ++row)
 		for (int column = 0; column < 3; ++column)
 			matrix(row, column) = float(rotation[3 * row + column]);

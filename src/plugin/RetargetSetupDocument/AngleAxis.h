@@ -1,8 +1,7 @@
 #pragma once
 
+#include "numerics/Matrix4.h"
 #include "numerics/Rotation.h"
-
-#include <QMatrix4x4>
 
 #include <optional>
 
@@ -12,12 +11,12 @@ namespace RetargetSetup
 /// The rotation of a transform as a vector along the axis, of the angle's length in radians, at most pi. Scale is taken
 /// out first by normalising the three columns. Nothing if what is left is no rotation: a mirror, a shear, a column of
 /// zeros, a value that is not finite.
-std::optional<Rotation::VVector3> RotationOf(const QMatrix4x4& i_rMatrix);
+std::optional<Rotation::VVector3> RotationOf(const Rotation::VMatrix4& i_rMatrix);
 
 /// As RotationOf, with (0, 0, 0) for what is no rotation.
-Rotation::VVector3 MatrixToAngleAxis(const QMatrix4x4& i_rMatrix);
+Rotation::VVector3 MatrixToAngleAxis(const Rotation::VMatrix4& i_rMatrix);
 
 /// The rotation of angle |r| about r, without a translation.
-QMatrix4x4 AngleAxisToMatrix(const Rotation::VVector3& i_rAngleAxis);
+Rotation::VMatrix4 AngleAxisToMatrix(const Rotation::VVector3& i_rAngleAxis);
 
 } // namespace RetargetSetup

@@ -26,6 +26,7 @@ namespace
 
 using CoreOrlexTypes::VSubjectParametrised;
 using Rotation::VMatrix3;
+using Rotation::VMatrix4;
 using Rotation::VPose;
 using Rotation::VVector3;
 
@@ -58,13 +59,13 @@ VVector3 Cross(const VVector3& i_rA, const VVector3& i_rB)
 	    i_rA[0] * i_rB[1] - i_rA[1] * i_rB[0]};
 }
 
-VVector3 Column(const QMatrix4x4& i_rMatrix, int i_Column)
+VVector3 Column(const VMatrix4& i_rMatrix, int i_Column)
 {
 	return {i_rMatrix(0, i_Column), i_rMatrix(1, i_Column), i_rMatrix(2, i_Column)};
 }
 
 /// Gram-Schmidt on the first two columns; the third follows from them, so that the result is always a rotation.
-VMatrix3 RotationWithoutScale(const QMatrix4x4& i_rMatrix)
+VMatrix3 RotationWithoutScale(const VMatrix4& i_rMatrix)
 {
 	VVector3 x = Column(i_rMatrix, 0);
 	VVector3 y = Column(i_rMatrix, 1);
@@ -118,13 +119,13 @@ FBXIO::VSkinSkeleton BonesOfSegments(
 }
 
 std::vector<VPose<double>> PosesInFile(
-    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_Scale, double i_RootFactor)
+    const FBXIO::VSkinSkeleton& i_rBones, const VMatrix4& i_rAxis, double i_Scale, double i_RootFactor)
 {
 	std::vector<VPose<double>> poses;
 	VVector3 root{};
 	for (const FBXIO::VSkinBone& rBone : i_rBones)
 	{
-		const QMatrix4x4 world = i_rAxis * rBone.m_Global;
+		const VMatrix4 world = i_rAxis * rBone.m_Global;
 		VPose<double> pose{RotationWithoutScale(world), Column(world, 3)};
 		if (poses.empty())
 		{
@@ -143,7 +144,7 @@ std::vector<VPose<double>> PosesInFile(
 }
 
 VFileMatch MatchFilePose(VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones,
-    const QMatrix4x4& i_rAxis, double i_RootFactor)
+    const VMatrix4& i_rAxis, double i_RootFactor)
 {
 	VFileMatch match;
 	if (io_rSubject.m_DynamicParameters.empty() || io_rSubject.m_Segments.size() != i_rBones.size())
@@ -209,7 +210,7 @@ bool HoldsFilePose(const VSubjectParametrised& i_rSubject)
 }
 
 std::optional<VPoseDifference> DifferenceFromFile(const VSubjectParametrised& i_rSubject,
-    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_RootFactor)
+    const FBXIO::VSkinSkeleton& i_rBones, const VMatrix4& i_rAxis, double i_RootFactor)
 {
 	CoreOrlexTypes::VSubject subject;
 	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(i_rSubject, subject);
@@ -228,7 +229,7 @@ std::string WorstText(const VSubjectParametrised& i_rSubject, const VPoseDiffere
 }
 
 void MatchFilePoseAndTell(VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones,
-    const QMatrix4x4& i_rAxis, double i_RootFactor)
+    const VMatrix4& i_rAxis, double i_RootFactor)
 {
 	const VFileMatch match = MatchFilePose(io_rSubject, i_rBones, i_rAxis, i_RootFactor);
 	if (!match.m_Lengths.empty())
@@ -245,7 +246,7 @@ void MatchFilePoseAndTell(VSubjectParametrised& io_rSubject, const FBXIO::VSkinS
 }
 
 std::optional<VTurnedRoot> FindTurnedRoot(
-    const VSubjectParametrised& i_rSubject, const FBXIO::VSkinSkeleton& i_rSkeleton, const QMatrix4x4& i_rAxis)
+    const VSubjectParametrised& i_rSubject, const FBXIO::VSkinSkeleton& i_rSkeleton, const VMatrix4& i_rAxis)
 {
 	if (i_rSubject.m_Segments.empty())
 		return std::nullopt;

@@ -3,9 +3,8 @@
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "FBXIO/SkinSkeleton.h"
 #include "RetargetSetupDocument/BindPose.h"
+#include "numerics/Matrix4.h"
 #include "numerics/Rotation.h"
-
-#include <QMatrix4x4>
 
 #include <cstddef>
 #include <optional>
@@ -28,7 +27,7 @@ FBXIO::VSkinSkeleton BonesOfSegments(const CoreOrlexTypes::VSubjectParametrised&
 /// @param i_rAxis turns the file's space into the system's Z-up space.
 /// @param i_RootFactor multiplies the height of the root above the floor.
 std::vector<Rotation::VPose<double>> PosesInFile(
-    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_Scale, double i_RootFactor = 1.0);
+    const FBXIO::VSkinSkeleton& i_rBones, const Rotation::VMatrix4& i_rAxis, double i_Scale, double i_RootFactor = 1.0);
 
 /// What MatchFilePose changed beside bind poses: indices of segments.
 struct VFileMatch
@@ -45,7 +44,7 @@ struct VFileMatch
 /// @param i_rBones as BonesOfSegments gives them.
 /// @param i_RootFactor multiplies the height of the root above the floor.
 VFileMatch MatchFilePose(CoreOrlexTypes::VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones,
-    const QMatrix4x4& i_rAxis, double i_RootFactor = 1.0);
+    const Rotation::VMatrix4& i_rAxis, double i_RootFactor = 1.0);
 
 /// True of a subject as CreateTargetSubject makes it, pruned or not: a free root, below it ball joints or none, no
 /// joint orientations, no post poses, and no dynamic parameter beside the scale.
@@ -54,14 +53,14 @@ bool HoldsFilePose(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
 /// The segment that stands farthest from its bone in the file, at the subject's scale; nothing if all stand where their
 /// bones do.
 std::optional<VPoseDifference> DifferenceFromFile(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
-    const FBXIO::VSkinSkeleton& i_rBones, const QMatrix4x4& i_rAxis, double i_RootFactor);
+    const FBXIO::VSkinSkeleton& i_rBones, const Rotation::VMatrix4& i_rAxis, double i_RootFactor);
 
 /// "at worst "Head" by 12.3 mm and 4.5 degrees".
 std::string WorstText(const CoreOrlexTypes::VSubjectParametrised& i_rSubject, const VPoseDifference& i_rWorst);
 
 /// MatchFilePose, with what it changed and what it could not reach told in the log.
 void MatchFilePoseAndTell(CoreOrlexTypes::VSubjectParametrised& io_rSubject, const FBXIO::VSkinSkeleton& i_rBones,
-    const QMatrix4x4& i_rAxis, double i_RootFactor);
+    const Rotation::VMatrix4& i_rAxis, double i_RootFactor);
 
 /// A root that stands turned because the pre-rotation of its bone counts twice: in its segment, and in the bone's place
 /// in the world that is its bind pose.
@@ -74,6 +73,6 @@ struct VTurnedRoot
 
 /// Nothing for a root that stands as its bone does, or in a pose that somebody gave it.
 std::optional<VTurnedRoot> FindTurnedRoot(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
-    const FBXIO::VSkinSkeleton& i_rSkeleton, const QMatrix4x4& i_rAxis);
+    const FBXIO::VSkinSkeleton& i_rSkeleton, const Rotation::VMatrix4& i_rAxis);
 
 } // namespace RetargetSetup

@@ -207,7 +207,7 @@ public:
 	std::shared_ptr<const FBXIO::VSkinSkeleton> GetFBXSkeleton() const { return m_pFBXSkeleton; }
 
 	/// Turns the FBX file's space into one with Z up.
-	const QMatrix4x4& GetTargetAxisMatrix() const { return m_TargetAxisMatrix; }
+	const Rotation::VMatrix4& GetTargetAxisMatrix() const { return m_TargetAxisMatrix; }
 
 	/// Fires at the end of every change, before LoadTargetSubject has taken over the source name: callbacks go through
 	/// a dispatcher and read what stands when they run.
@@ -325,7 +325,7 @@ private:
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame;
 	/// Set by nothing and read by nothing, as is the spare flag.
 	QMatrix4x4 m_SpareMatrix;
-	QMatrix4x4 m_TargetAxisMatrix;
+	Rotation::VMatrix4 m_TargetAxisMatrix;
 	std::uint32_t m_TargetRootIndex = 0;
 	double m_TargetScale = 1.0;
 	[[maybe_unused]] bool m_bSpare = false;

@@ -130,6 +130,19 @@ bool ReadsBack(
 	return true;
 }
 
+/// A quarter turn about Y or X; the identity for a file with Z up.
+Rotation::VMatrix4 ToZUp(int i_UpAxis)
+{
+	Rotation::VMatrix4 matrix;
+	if (i_UpAxis > 1)
+		return matrix;
+	const int from = i_UpAxis == 0 ? 0 : 1;
+	matrix(from, from) = matrix(2, 2) = 0.0f;
+	matrix(from, 2) = -1.0f;
+	matrix(2, from) = 1.0f;
+	return matrix;
+}
+
 } // namespace
 
 bool VRetargetSetup::LoadTargetFBX(const boost::filesystem::path& i_rPath)
@@ -150,13 +163,7 @@ bool VRetargetSetup::LoadTargetFBX(const boost::filesystem::path& i_rPath)
 	}
 	m_TargetName = RetargetSetup::FileStem(i_rPath);
 	m_bTargetRootChosen = false;
-	m_TargetAxisMatrix.setToIdentity();
-	switch (reader.GetUpAxis())
-	{
-	case 0: m_TargetAxisMatrix.rotate(-90.0f, 0.0f, 1.0f, 0.0f); break;
-	case 1: m_TargetAxisMatrix.rotate(90.0f, 1.0f, 0.0f, 0.0f); break;
-	default: break;
-	}
+	m_TargetAxisMatrix = ToZUp(reader.GetUpAxis());
 	return true;
 }
 
@@ -183,8 +190,8 @@ void VRetargetSetup::CreateTargetSubject()
 		return Ignore(c_Command, Ignored::c_NoRootBone);
 	}
 	const FBXIO::VSkinBone& rRootBone = (*pSkeleton)[m_TargetRootIndex];
-	const QMatrix4x4 axis = m_TargetAxisMatrix;
-	const QMatrix4x4 world = axis * rRootBone.m_Global;
+	const Rotation::VMatrix4 axis = m_TargetAxisMatrix;
+	const Rotation::VMatrix4 world = axis * rRootBone.m_Global;
 	const FBXIO::VSkinSkeleton bones = RetargetSetup::ExtractSubtree(*pSkeleton, m_TargetRootIndex);
 	const bool bRootChosen = m_bTargetRootChosen;
 	const bool bPoseFromFile = HostRules().m_bPoseFromFile;

@@ -7,8 +7,6 @@
 #include "RetargetSetupDocument/Joints.h"
 #include "math/NumberText.h"
 
-#include <QVector4D>
-
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
 using FBXIO::VSkinBone;
@@ -21,7 +19,8 @@ namespace
 {
 
 /// A mirrored or sheared transform has no rotation to take over: the operator is told, since the pose will differ.
-Rotation::VVector3 RotationOrTold(const QMatrix4x4& i_rMatrix, const std::string& i_rBoneName, const char* i_pWhat)
+Rotation::VVector3 RotationOrTold(
+    const Rotation::VMatrix4& i_rMatrix, const std::string& i_rBoneName, const char* i_pWhat)
 {
 	const std::optional<Rotation::VVector3> rotation = RotationOf(i_rMatrix);
 	if (!rotation)
@@ -44,12 +43,12 @@ void FillSegment(VSubjectParametrised& io_rSubject, const VSkinSkeleton& i_rBone
 		rSegment.m_TreeDepth = io_rSubject.m_Segments[std::size_t(rBone.m_ParentIndex)].m_TreeDepth + 1;
 		factor = i_rBones[std::size_t(rBone.m_ParentIndex)].m_AccumulatedScale;
 	}
-	const QVector4D translation = rBone.m_Local.column(3) * factor;
+	const std::array<float, 3> translation = rBone.m_Local.Translation();
 	const Rotation::VVector3 preRotation = RotationOrTold(rBone.m_PreRotation, rBone.m_Name, "pre-rotation");
 	for (int i = 0; i < 3; ++i)
 	{
 		rSegment.m_PreRotation[i] = NumberText::PrintF(preRotation[i]);
-		rSegment.m_PreTranslation[i] = NumberText::PrintF(translation[i]) + "*" + c_GlobalScaleName;
+		rSegment.m_PreTranslation[i] = NumberText::PrintF(translation[i] * factor) + "*" + c_GlobalScaleName;
 	}
 	EnableJoint(io_rSubject, i_Index, RotationOrTold(rBone.m_Local, rBone.m_Name, "local transform"));
 }
@@ -71,7 +70,7 @@ VSkinSkeleton ExtractSubtree(const VSkinSkeleton& i_rSkeleton, std::size_t i_Roo
 		subtree.push_back(i_rSkeleton[i]);
 		subtree.back().m_ParentIndex = parent;
 		if (parent == -1)
-			subtree.back().m_Local.setToIdentity();
+			subtree.back().m_Local = {};
 	}
 	return subtree;
 }

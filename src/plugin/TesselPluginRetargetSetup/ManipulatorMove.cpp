@@ -1,5 +1,6 @@
 #include "TesselPluginRetargetSetup/ManipulatorMove.h"
 
+#include "CoreGraphics/QtForm.h"
 #include "CoreOrlexTypes/JointType.h"
 #include "RetargetSetupDocument/AngleAxis.h"
 #include "RetargetSetupDocument/Mirror.h"
@@ -7,6 +8,8 @@
 
 #include <algorithm>
 
+using CoreGraphics::FromQt;
+using CoreGraphics::ToQt;
 using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectParametrised;
 
@@ -32,7 +35,7 @@ QMatrix4x4 JointRotation(const VSubjectParametrised::VJoint& i_rJoint)
 {
 	Rotation::VVector3 rotation{};
 	std::copy_n(i_rJoint.m_BindPose.begin(), std::min(c_RotationLength, i_rJoint.m_BindPose.size()), rotation.begin());
-	return AngleAxisToMatrix(rotation);
+	return ToQt(AngleAxisToMatrix(rotation));
 }
 
 Rotation::VVector3 Origin(const QMatrix4x4& i_rMatrix)
@@ -42,7 +45,7 @@ Rotation::VVector3 Origin(const QMatrix4x4& i_rMatrix)
 
 void SetRotation(std::vector<double>& io_rPose, const QMatrix4x4& i_rRotation)
 {
-	const Rotation::VVector3 angleAxis = MatrixToAngleAxis(i_rRotation);
+	const Rotation::VVector3 angleAxis = MatrixToAngleAxis(FromQt(i_rRotation));
 	std::copy_n(angleAxis.begin(), std::min(c_RotationLength, io_rPose.size()), io_rPose.begin());
 }
 
@@ -50,7 +53,7 @@ void SetRotation(std::vector<double>& io_rPose, const QMatrix4x4& i_rRotation)
 
 QMatrix4x4 JointFrame(const QMatrix4x4& i_rParentWorld, const VSubject::VSegment& i_rSegment)
 {
-	QMatrix4x4 joint = AngleAxisToMatrix(i_rSegment.m_PreRotation);
+	QMatrix4x4 joint = ToQt(AngleAxisToMatrix(i_rSegment.m_PreRotation));
 	for (int row = 0; row < 3; ++row)
 		joint(row, 3) = float(i_rSegment.m_PreTranslation[std::size_t(row)]);
 	return i_rParentWorld * joint;
@@ -72,9 +75,9 @@ void PoseMirrorSegment(VSubjectParametrised::VSegment& io_rMirrorSegment, const 
     const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, const QMatrix4x4& i_rMirrorJointFrame,
     const QMatrix4x4& i_rMirrorFrom)
 {
-	const Rotation::VVector3 turn = MatrixToAngleAxis(i_rWorld * i_rFrom.inverted());
+	const Rotation::VVector3 turn = MatrixToAngleAxis(FromQt(i_rWorld * i_rFrom.inverted()));
 	const QMatrix4x4 mirrored =
-	    AngleAxisToMatrix(Mirrored(turn, MirrorNormal(Origin(i_rOrigin), Origin(i_rMirrorJointFrame))));
+	    ToQt(AngleAxisToMatrix(Mirrored(turn, MirrorNormal(Origin(i_rOrigin), Origin(i_rMirrorJointFrame)))));
 	std::vector<double>& rPose = WholePose(io_rMirrorSegment.m_Joint);
 	SetRotation(rPose, i_rMirrorJointFrame.inverted() * mirrored * i_rMirrorFrom);
 	io_rMirrorSegment.m_Joint.m_Mean = rPose;

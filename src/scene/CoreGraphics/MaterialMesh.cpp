@@ -1,5 +1,7 @@
 #include "CoreGraphics/MaterialMesh.h"
 
+#include "CoreGraphics/Picture.h"
+#include "CoreGraphics/QtForm.h"
 #include "CoreGraphics/RenderContext.h"
 
 namespace CoreGraphics
@@ -13,10 +15,10 @@ constexpr unsigned int c_DiffuseUnit = 0;
 constexpr VTextureSampling c_DiffuseSampling{EMinificationLinearMipmapLinear, true};
 
 /// A colour that lets light through counts as much as its factor says.
-float AlphaOf(const QVector4D& i_rTransparent)
+float AlphaOf(const FBXIO::VColourAndFactor& i_rTransparent)
 {
-	const float sum = i_rTransparent.x() + i_rTransparent.y() + i_rTransparent.z();
-	return 1.0f - sum * i_rTransparent.w() * 0.33333334f;
+	const auto [red, green, blue, factor] = i_rTransparent;
+	return 1.0f - (red + green + blue) * factor * 0.33333334f;
 }
 
 } // namespace
@@ -34,13 +36,14 @@ void VImageTexture::Bind(VRenderContext& io_rContext, unsigned int i_Unit)
 		m_pTexture->Bind(io_rContext, i_Unit, c_DiffuseSampling);
 }
 
-std::shared_ptr<VImageTexture> VMaterialMeshMaker::Texture(const std::shared_ptr<const QImage>& i_rpImage)
+std::shared_ptr<VImageTexture> VMaterialMeshMaker::Texture(const std::shared_ptr<const FBXIO::VPicture>& i_rpPicture)
 {
-	if (!i_rpImage)
+	const auto* const pDecoded = dynamic_cast<const VDecodedPicture*>(i_rpPicture.get());
+	if (!pDecoded)
 		return {};
-	std::shared_ptr<VImageTexture>& rpTexture = m_Textures[i_rpImage];
+	std::shared_ptr<VImageTexture>& rpTexture = m_Textures[i_rpPicture];
 	if (!rpTexture)
-		rpTexture = std::make_shared<VImageTexture>(*i_rpImage);
+		rpTexture = std::make_shared<VImageTexture>(pDecoded->m_Image);
 	return rpTexture;
 }
 
@@ -50,8 +53,9 @@ VMaterialMesh VMaterialMeshMaker::MakeOf(const FBXIO::VMesh<TVertex>& i_rMesh, c
 	VMaterialMesh mesh{VVertexBuffer(i_rFormat, BytesOf(i_rMesh.m_Vertices)), {}};
 	for (const FBXIO::VMeshPart& rPart : i_rMesh.m_Parts)
 		if (!rPart.m_Indices.empty())
-			mesh.m_Parts.push_back({VIndexBuffer(rPart.m_Indices, rPart.m_IndexSize), rPart.m_Diffuse, rPart.m_Specular,
-			    rPart.m_Emissive, rPart.m_Shininess, AlphaOf(rPart.m_Transparent), Texture(rPart.m_pTexture)});
+			mesh.m_Parts.push_back({VIndexBuffer(rPart.m_Indices, rPart.m_IndexSize), ToQt(rPart.m_Diffuse),
+			    ToQt(rPart.m_Specular), ToQt(rPart.m_Emissive), rPart.m_Shininess, AlphaOf(rPart.m_Transparent),
+			    Texture(rPart.m_pTexture)});
 	return mesh;
 }
 

@@ -51,7 +51,8 @@ struct VMaterialMesh
 	std::vector<VMaterialPart> m_Parts;
 };
 
-/// Makes meshes whose parts share textures where they share images. Any thread.
+/// Makes meshes whose parts share textures where they share pictures. A picture that was opened by another opener than
+/// OpenPicture is not drawn. Any thread.
 class VMaterialMeshMaker
 {
 public:
@@ -61,10 +62,10 @@ public:
 private:
 	template <typename TVertex>
 	VMaterialMesh MakeOf(const FBXIO::VMesh<TVertex>& i_rMesh, const VVertexFormat& i_rFormat);
-	std::shared_ptr<VImageTexture> Texture(const std::shared_ptr<const QImage>& i_rpImage);
+	std::shared_ptr<VImageTexture> Texture(const std::shared_ptr<const FBXIO::VPicture>& i_rpPicture);
 
-	/// The images are kept, so that no other one gets the address of one of them.
-	std::map<std::shared_ptr<const QImage>, std::shared_ptr<VImageTexture>> m_Textures;
+	/// The pictures are kept, so that no other one gets the address of one of them.
+	std::map<std::shared_ptr<const FBXIO::VPicture>, std::shared_ptr<VImageTexture>> m_Textures;
 };
 
 /// What the programs with a material ask for.

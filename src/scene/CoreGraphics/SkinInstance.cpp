@@ -1,5 +1,6 @@
 #include "CoreGraphics/SkinInstance.h"
 
+#include "CoreGraphics/QtForm.h"
 #include "CoreGraphics/Skin.h"
 #include "DebugServices/GlobalLog.h"
 
@@ -99,7 +100,7 @@ void VSkinInstance::MapBones(const std::vector<std::string>& i_rNames, const std
 			continue;
 		// The longest of a bone's children tells how much longer the subject's is.
 		const auto parent = static_cast<std::size_t>(rBone.m_ParentIndex);
-		const float length = rBone.m_Local.column(3).toVector3D().length() * rSkeleton[parent].m_AccumulatedScale;
+		const float length = ToQt(rBone.m_Local.Translation()).length() * rSkeleton[parent].m_AccumulatedScale;
 		const float wanted = i_rOffsets[i].length();
 		if (length > c_NoLength && wanted > c_NoLength && length > longest[parent])
 		{
@@ -154,7 +155,7 @@ void VSkinInstance::MakeDrivers()
 	// Parents stand before their children.
 	for (const std::size_t bone : m_UnmappedBones)
 	{
-		places[bone] = rSkeleton[bone].m_Local;
+		places[bone] = ToQt(rSkeleton[bone].m_Local);
 		if (const auto parent = static_cast<std::size_t>(rSkeleton[bone].m_ParentIndex); parent < bone)
 		{
 			m_Drivers[bone].m_Segment = m_Drivers[parent].m_Segment;
@@ -164,7 +165,7 @@ void VSkinInstance::MakeDrivers()
 	m_BoneMatrices.resize(rSkeleton.size());
 	for (std::size_t i = 0; i < rSkeleton.size(); ++i)
 	{
-		m_Drivers[i].m_Offset = ToColumns(places[i] * rSkeleton[i].m_InverseBind);
+		m_Drivers[i].m_Offset = ToColumns(places[i] * ToQt(rSkeleton[i].m_InverseBind));
 		m_BoneMatrices[i] = m_Drivers[i].m_Offset;
 	}
 }
@@ -189,7 +190,8 @@ void VSkinInstance::WarnOfMismatches() const
 	for (const std::size_t bone : m_UnmappedBones)
 	{
 		const auto parent = static_cast<std::size_t>(rSkeleton[bone].m_ParentIndex);
-		turns[bone] = !qFuzzyCompare(rSkeleton[bone].m_PreRotation, QMatrix4x4()) || (parent < bone && turns[parent]);
+		turns[bone] =
+		    !qFuzzyCompare(ToQt(rSkeleton[bone].m_PreRotation), QMatrix4x4()) || (parent < bone && turns[parent]);
 		if (!turns[bone] || !m_pSkin->MovesVertices(bone))
 			continue;
 		if (++count <= c_MaxNames)

@@ -1,5 +1,6 @@
 #include "OrlexGraphics/skins/SkinLoadJob.h"
 
+#include "CoreGraphics/Picture.h"
 #include "CoreGraphics/Skin.h"
 #include "DebugServices/GlobalLog.h"
 #include "FBXIO/FBXReader.h"
@@ -39,6 +40,7 @@ void VSkinLoadJob::Run()
 		FBXIO::FBXReader reader;
 		FBXIO::VSkin data;
 		reader.SetMeshRules(m_Rules);
+		reader.SetPictures(&CoreGraphics::OpenPicture);
 		if (!reader.LoadFile(path))
 			NVX_LOG("VSkinCache", NVX::ELogError, "The skin %1% is not shown: %2% could not be read", m_Name, path);
 		else

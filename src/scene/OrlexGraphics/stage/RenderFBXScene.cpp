@@ -1,5 +1,7 @@
 #include "OrlexGraphics/stage/RenderFBXScene.h"
 
+#include "CoreGraphics/Picture.h"
+#include "CoreGraphics/QtForm.h"
 #include "CoreGraphics/RenderContext.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "FBXIO/FBXReader.h"
@@ -20,11 +22,12 @@ VRenderFBXScene::VRenderFBXScene(CoreGraphics::VShaderLibrary& io_rLibrary)
 std::vector<VRenderFBXScene::VMesh> VRenderFBXScene::ReadMeshes(FBXIO::FBXReader& io_rReader)
 {
 	std::vector<FBXIO::VPlacedMesh> placed;
+	io_rReader.SetPictures(&CoreGraphics::OpenPicture);
 	io_rReader.ReadPlacedMeshes(placed);
 	CoreGraphics::VMaterialMeshMaker maker;
 	std::vector<VMesh> meshes;
 	for (const FBXIO::VPlacedMesh& rMesh : placed)
-		meshes.push_back({maker.Make(rMesh.m_Mesh), rMesh.m_Transform});
+		meshes.push_back({maker.Make(rMesh.m_Mesh), CoreGraphics::ToQt(rMesh.m_Transform)});
 	return meshes;
 }
 
