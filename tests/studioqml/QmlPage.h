@@ -1,6 +1,7 @@
 #pragma once
 
 #include "InMemoryHost/Selection.h"
+#include "NVX/SelectionItemVariant.h"
 #include "studio/qmltypes/QmlModules.h"
 
 #include <QQmlEngine>
