@@ -4,10 +4,10 @@
 #include "Ratios.h"
 
 #include "InMemoryHost/PluginContext.h"
-#include "RetargetSetupDocument/GlobalScale.h"
-#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupCore/GlobalScale.h"
+#include "RetargetSetupCore/Identity.h"
+#include "RetargetSetupCore/TargetConstruction.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
-#include "RetargetSetupDocument/TargetConstruction.h"
 
 #include <memory>
 #include <random>

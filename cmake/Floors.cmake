@@ -8,10 +8,15 @@ set(RETARGET_WING_toolbox CoreOrlexTypesUtils)
 set(RETARGET_WING_formats UtilsRapidXml CoreOrlexQRTIO fbxsdk FBXIO)
 set(RETARGET_WING_hostdata TesselDataStore TesselParameters TesselParametersGUI Flow2TypesUtils InMemoryHost)
 set(RETARGET_WING_scene CoreGraphics OrlexGraphics Flow2Graphics)
-set(RETARGET_WING_plugin RetargetSetupDocument OrlexQtQuick TesselPluginRetargetSetup)
+set(RETARGET_WING_plugin RetargetSetupCore RetargetSetupDocument OrlexQtQuick TesselPluginRetargetSetup)
 
 # Above them apps/: the programs may use every library, the first of these folders, and nothing of each other.
 set(RETARGET_PROGRAM_FOLDERS CommandLineText retarget studio)
+
+# Which of them are built only where there is Qt.
+set(RETARGET_QT_LIBRARY_FOLDERS hostdata/TesselParametersGUI scene/CoreGraphics scene/OrlexGraphics scene/Flow2Graphics
+	plugin/RetargetSetupDocument plugin/OrlexQtQuick plugin/TesselPluginRetargetSetup)
+set(RETARGET_QT_PROGRAM_FOLDERS studio)
 
 foreach(wing IN LISTS RETARGET_WINGS)
 	foreach(library IN LISTS RETARGET_WING_${wing})

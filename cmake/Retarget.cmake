@@ -119,6 +119,8 @@ function(retarget_package)
 	set(folder ${CMAKE_INSTALL_LIBDIR}/cmake/RetargetSetup)
 	install(EXPORT RetargetSetup FILE RetargetSetupTargets.cmake NAMESPACE RetargetSetup:: DESTINATION ${folder})
 	write_basic_package_version_file(${PROJECT_BINARY_DIR}/RetargetSetupConfigVersion.cmake COMPATIBILITY SameMinorVersion)
-	install(FILES ${PROJECT_BINARY_DIR}/RetargetSetupConfigVersion.cmake ${PROJECT_SOURCE_DIR}/cmake/RetargetSetupConfig.cmake
+	configure_file(${PROJECT_SOURCE_DIR}/cmake/RetargetSetupConfig.cmake ${PROJECT_BINARY_DIR}/RetargetSetupConfig.cmake
+		@ONLY)
+	install(FILES ${PROJECT_BINARY_DIR}/RetargetSetupConfigVersion.cmake ${PROJECT_BINARY_DIR}/RetargetSetupConfig.cmake
 		DESTINATION ${folder})
 endfunction()

@@ -1,6 +1,6 @@
 #include "TestDocument.h"
 
-#include "RetargetSetupDocument/AngleAxis.h"
+#include "RetargetSetupCore/AngleAxis.h"
 #include "UtilsFileSystem/Paths.h"
 
 #include <QMetaMethod>

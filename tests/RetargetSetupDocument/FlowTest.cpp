@@ -6,8 +6,8 @@
 #include "CoreOrlexTypes/SubjectRecord.h"
 #include "CoreOrlexTypes/TextForm.h"
 #include "InMemoryHost/Application.h"
-#include "RetargetSetupDocument/FilePath.h"
-#include "RetargetSetupDocument/RootHeight.h"
+#include "RetargetSetupCore/FilePath.h"
+#include "RetargetSetupCore/RootHeight.h"
 
 #include <boost/filesystem/operations.hpp>
 

@@ -1,9 +1,9 @@
 #pragma once
 
+#include "../RetargetSetupCore/TestSubjects.h"
 #include "../UtilsFileSystem/Folder.h"
 #include "InMemoryHost/PluginContext.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
-#include "TestSubjects.h"
 
 #include <gtest/gtest.h>
 

@@ -5,10 +5,10 @@
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "InMemoryHost/Application.h"
 #include "InMemoryHost/PluginContext.h"
-#include "RetargetSetupDocument/BindPose.h"
-#include "RetargetSetupDocument/Mirror.h"
+#include "RetargetSetupCore/BindPose.h"
+#include "RetargetSetupCore/Mirror.h"
+#include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
-#include "RetargetSetupDocument/RetargetTargets.h"
 
 #include <Eigen/Geometry>
 #include <boost/filesystem/operations.hpp>

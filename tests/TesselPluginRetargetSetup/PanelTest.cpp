@@ -3,7 +3,7 @@
 #include "TestPanel.h"
 
 #include "OrlexGraphics/item/SceneFramebufferObject.h"
-#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupCore/Identity.h"
 
 #include <QLayout>
 #include <QQmlProperty>

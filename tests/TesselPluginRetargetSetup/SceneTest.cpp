@@ -3,7 +3,7 @@
 #include "NVX/SelectionItemVariant.h"
 #include "OrlexGraphics/frame/FrameRenderer.h"
 #include "OrlexGraphics/manipulator/RenderManipulator.h"
-#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupCore/Identity.h"
 #include "TestPanel.h"
 
 #include <QOpenGLFramebufferObject>

@@ -2,7 +2,7 @@
 
 #include "../FindItem.h"
 #include "OrlexGraphics/item/SceneFramebufferObject.h"
-#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupCore/Identity.h"
 
 #include <QtQml>
 

@@ -6,7 +6,7 @@
 #include "retarget/subject/Elements.h"
 #include "retarget/text/Output.h"
 
-#include "RetargetSetupDocument/SideOfName.h"
+#include "RetargetSetupCore/SideOfName.h"
 
 #include <gtest/gtest.h>
 

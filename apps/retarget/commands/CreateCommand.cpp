@@ -6,7 +6,7 @@
 #include "retarget/text/OutputFile.h"
 
 #include "DebugServices/GlobalLog.h"
-#include "RetargetSetupDocument/FilePose.h"
+#include "RetargetSetupCore/FilePose.h"
 
 namespace CommandLine
 {

@@ -9,7 +9,7 @@
 
 #include "CoreOrlexTypes/Fields.h"
 #include "DebugServices/GlobalLog.h"
-#include "RetargetSetupDocument/RetargetTargets.h"
+#include "RetargetSetupCore/RetargetTargets.h"
 
 #include <numbers>
 #include <unistd.h>
@@ -76,7 +76,7 @@ void TellDisagreement(const std::vector<VTargetLine>& i_rLines)
 
 std::vector<VTargetLine> Lines(VSession& io_rSession, bool i_bResiduals)
 {
-	const VRetargetSetup::VSubjectValues target = io_rSession.Document().TargetValues();
+	const VRetargetSetupCore::VSubjectValues target = io_rSession.Document().TargetValues();
 	const auto& rSubject = *target.m_pParametrised;
 	std::vector<VTargetLine> lines(rSubject.m_Targets.size());
 	std::vector<VTargetResidual> residuals(lines.size());

@@ -9,7 +9,7 @@
 #include "CoreOrlexTypes/Fields.h"
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "FBXIO/FBXReader.h"
-#include "RetargetSetupDocument/SideOfName.h"
+#include "RetargetSetupCore/SideOfName.h"
 
 #include <algorithm>
 #include <cmath>

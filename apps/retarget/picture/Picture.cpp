@@ -52,10 +52,10 @@ OrlexGraphics::VSceneOptions ViewOptions()
 }
 
 /// All segments of both subjects, as the preview knows them.
-std::vector<NVX::ISelectionItem> Segments(const VRetargetSetup& i_rDocument)
+std::vector<NVX::ISelectionItem> Segments(const VRetargetSetupCore& i_rDocument)
 {
 	std::vector<NVX::ISelectionItem> items;
-	const auto add = [&](const VRetargetSetup::VSubjectValues& i_rValues, std::uint32_t i_Kind)
+	const auto add = [&](const VRetargetSetupCore::VSubjectValues& i_rValues, std::uint32_t i_Kind)
 	{
 		if (i_rValues.m_pParametrised)
 			for (std::uint32_t i = 0; i < i_rValues.m_pParametrised->m_Segments.size(); ++i)

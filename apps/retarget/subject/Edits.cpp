@@ -9,8 +9,8 @@
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
-#include "RetargetSetupDocument/RetargetTargets.h"
-#include "RetargetSetupDocument/SideOfName.h"
+#include "RetargetSetupCore/RetargetTargets.h"
+#include "RetargetSetupCore/SideOfName.h"
 #include "UtilsFileSystem/Files.h"
 #include "math/NumberText.h"
 
@@ -322,7 +322,7 @@ void ReadEdits(const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
 
 /// What was told at loading and behind each edit of expressions that do not evaluate is forgotten for what is true of
 /// the target subject in the end. Of a performer only states of targets can fail, which nothing here asks for.
-void TellExpressionsAgain(const VRetargetSetup& i_rDocument)
+void TellExpressionsAgain(const VRetargetSetupCore& i_rDocument)
 {
 	ForgetMessages([](const std::string& i_rCategory, const std::string&) { return i_rCategory == "SubjectUtils"; });
 	CoreOrlexTypes::VSubject subject;

@@ -59,7 +59,8 @@ double DistanceFromLine(const VVector3& i_rPoint, const VVector3& i_rOnLine1, co
 class VSourcePoses
 {
 public:
-	explicit VSourcePoses(const VRetargetSetup::VSubjectValues& i_rSource) : m_Poses(BindPosesOf(i_rSource, "source"))
+	explicit VSourcePoses(const VRetargetSetupCore::VSubjectValues& i_rSource)
+	    : m_Poses(BindPosesOf(i_rSource, "source"))
 	{
 		const auto& rSegments = i_rSource.m_pParametrised->m_Segments;
 		for (std::size_t i = 0; i < std::min(rSegments.size(), m_Poses.size()); ++i)
@@ -150,7 +151,7 @@ std::vector<std::string> FollowedNames(
 }
 
 std::vector<VTargetResidual> Residuals(
-    const VRetargetSetup::VSubjectValues& i_rSource, const VRetargetSetup::VSubjectValues& i_rTarget)
+    const VRetargetSetupCore::VSubjectValues& i_rSource, const VRetargetSetupCore::VSubjectValues& i_rTarget)
 {
 	const auto& rSubject = *i_rTarget.m_pParametrised;
 	std::vector<VTargetResidual> residuals(rSubject.m_Targets.size());

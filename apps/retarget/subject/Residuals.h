@@ -35,7 +35,7 @@ std::vector<std::string> FollowedNames(const CoreOrlexTypes::VSubjectParametrise
 /// One for each target; empty ones for direction targets, for targets that do not fit their type and where a segment is
 /// not there.
 std::vector<VTargetResidual> Residuals(
-    const VRetargetSetup::VSubjectValues& i_rSource, const VRetargetSetup::VSubjectValues& i_rTarget);
+    const VRetargetSetupCore::VSubjectValues& i_rSource, const VRetargetSetupCore::VSubjectValues& i_rTarget);
 
 /// The target whose two residuals differ most, if any differ by more than rounding.
 std::optional<std::size_t> WorstDisagreement(const std::vector<VTargetResidual>& i_rResiduals);

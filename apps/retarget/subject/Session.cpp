@@ -12,8 +12,8 @@
 #include "FBXIO/FBXReader.h"
 #include "InMemoryHost/Flow.h"
 #include "NVX/Status.h"
-#include "RetargetSetupDocument/BindPose.h"
-#include "RetargetSetupDocument/TargetConstruction.h"
+#include "RetargetSetupCore/BindPose.h"
+#include "RetargetSetupCore/TargetConstruction.h"
 #include "UtilsFileSystem/Files.h"
 
 #include <boost/filesystem/operations.hpp>
@@ -47,7 +47,7 @@ std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_r
 VSession::VSession()
     : m_pApplication(std::make_shared<InMemoryHost::VApplication>()),
       m_pDispatcher(std::make_shared<InMemoryHost::VDispatcher>()),
-      m_pDocument(std::make_shared<VRetargetSetup>(m_pDispatcher,
+      m_pDocument(std::make_shared<VRetargetSetupCore>(m_pDispatcher,
           NVX::CountedPointer<TesselPluginInterface::IFrameFactory>(new InMemoryHost::VFrameFactory),
           NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)))
 {
@@ -163,7 +163,8 @@ const CoreOrlexTypes::VSubjectParametrised& VSession::Target() const
 	return *m_pDocument->TargetValues().m_pParametrised;
 }
 
-std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectValues& i_rValues, const char* i_pWhich)
+std::vector<Rotation::VPose<double>> BindPosesOf(
+    const VRetargetSetupCore::VSubjectValues& i_rValues, const char* i_pWhich)
 {
 	const auto pFK = RetargetSetup::KinematicsInBindPose(*i_rValues.m_pParametrised, *i_rValues.m_pSubject, i_pWhich);
 	return pFK ? RetargetSetup::SegmentPoses(*pFK) : std::vector<Rotation::VPose<double>>();

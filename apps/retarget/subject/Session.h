@@ -4,7 +4,7 @@
 
 #include "InMemoryHost/Application.h"
 #include "InMemoryHost/Dispatcher.h"
-#include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupCore/RetargetSetupCore.h"
 #include "numerics/Rotation.h"
 
 #include <memory>
@@ -43,8 +43,8 @@ public:
 	/// With --json: where the subject was saved and what it holds.
 	void Report(const std::string& i_rPath) const;
 
-	VRetargetSetup& Document() { return *m_pDocument; }
-	const std::shared_ptr<VRetargetSetup>& SharedDocument() const { return m_pDocument; }
+	VRetargetSetupCore& Document() { return *m_pDocument; }
+	const std::shared_ptr<VRetargetSetupCore>& SharedDocument() const { return m_pDocument; }
 	const std::shared_ptr<InMemoryHost::VDispatcher>& Dispatcher() const { return m_pDispatcher; }
 
 	/// Runs what the document has posted.
@@ -69,7 +69,7 @@ public:
 private:
 	std::shared_ptr<InMemoryHost::VApplication> m_pApplication;
 	std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher;
-	std::shared_ptr<VRetargetSetup> m_pDocument;
+	std::shared_ptr<VRetargetSetupCore> m_pDocument;
 	/// False where it came from standard input.
 	bool m_bSourceNamed = true;
 	bool m_bTargetNamed = true;
@@ -77,6 +77,7 @@ private:
 
 /// World poses of all segments of a subject in its bind pose, in mm; empty, which is told, if it has no
 /// kinematics.
-std::vector<Rotation::VPose<double>> BindPosesOf(const VRetargetSetup::VSubjectValues& i_rValues, const char* i_pWhich);
+std::vector<Rotation::VPose<double>> BindPosesOf(
+    const VRetargetSetupCore::VSubjectValues& i_rValues, const char* i_pWhich);
 
 } // namespace CommandLine

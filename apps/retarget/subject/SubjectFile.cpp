@@ -11,8 +11,8 @@
 #include "CoreOrlexQRTIO/Writer.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
-#include "RetargetSetupDocument/FilePath.h"
-#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupCore/FilePath.h"
+#include "RetargetSetupCore/Identity.h"
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
 

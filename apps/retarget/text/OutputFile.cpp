@@ -3,7 +3,7 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
 
-#include "RetargetSetupDocument/FilePath.h"
+#include "RetargetSetupCore/FilePath.h"
 #include "UtilsFileSystem/Paths.h"
 
 #include <boost/algorithm/string/case_conv.hpp>

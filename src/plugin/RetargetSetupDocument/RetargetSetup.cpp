@@ -1,46 +1,16 @@
 #include "RetargetSetupDocument/RetargetSetup.h"
 
-#include "ComputeSubjectFK/ComputeSubjectFK.h"
-#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
-#include "DebugServices/GlobalLog.h"
-#include "RetargetSetupDocument/GlobalScale.h"
-#include "RetargetSetupDocument/Identity.h"
-#include "RetargetSetupDocument/IgnoredCommands.h"
-#include "RetargetSetupDocument/RootHeight.h"
+#include "RetargetSetupCore/IgnoredCommands.h"
+#include "UtilsFileSystem/Paths.h"
 
-#include <algorithm>
-
-using CoreOrlexTypes::VSubject;
-using CoreOrlexTypes::VSubjectApplicationData;
-using CoreOrlexTypes::VSubjectParametrised;
-using NVX::CountedPointer;
-using RetargetSetup::c_LogCategory;
-using TesselPluginInterface::IFlowItem;
-using TesselPluginInterface::ItemValue;
-
-namespace
-{
-
-/// The scene tells the two subjects apart by their flow types.
-const std::string c_SourceFlavour;
-const std::string c_TargetFlavour = "ForSolving";
-
-template <typename T>
-bool CopyOut(const std::shared_ptr<const T>& i_rpValue, T& o_rValue)
-{
-	if (i_rpValue)
-		o_rValue = *i_rpValue;
-	return i_rpValue != nullptr;
-}
-
-} // namespace
+#include <QString>
 
 VRetargetSetup::VRetargetSetup(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
-    CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory,
-    CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory)
-    : m_pDispatcher(std::move(i_pDispatcher)), m_pFrameFactory(std::move(i_pFrameFactory)),
-      m_pItemFactory(std::move(i_pItemFactory)), m_pSourceSegmentModel(std::make_shared<VRetargetSetupSegmentModel>(
-                                                     VRetargetSetupSegmentModel::EFlavour::ESource)),
+    NVX::CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory,
+    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory)
+    : VRetargetSetupCore(std::move(i_pDispatcher), std::move(i_pFrameFactory), std::move(i_pItemFactory)),
+      m_pSourceSegmentModel(
+          std::make_shared<VRetargetSetupSegmentModel>(VRetargetSetupSegmentModel::EFlavour::ESource)),
       m_pTargetSegmentModel(
           std::make_shared<VRetargetSetupSegmentModel>(VRetargetSetupSegmentModel::EFlavour::ETarget)),
       m_pTargetModel(std::make_shared<VRetargetSetupTargetModel>())
@@ -49,244 +19,44 @@ VRetargetSetup::VRetargetSetup(std::shared_ptr<TesselPluginInterface::IDispatche
 
 VRetargetSetup::~VRetargetSetup() = default;
 
-void VRetargetSetup::SetHostRules(std::shared_ptr<TesselPluginInterface::IHostRules> i_pRules)
+void VRetargetSetup::Published()
 {
-	m_pHostRules = std::move(i_pRules);
-}
-
-TesselPluginInterface::VHostRules VRetargetSetup::HostRules() const
-{
-	return m_pHostRules ? m_pHostRules->Rules() : TesselPluginInterface::VHostRules();
-}
-
-bool VRetargetSetup::MayReplaceTarget(const char* i_pCommand, const char* i_pAction)
-{
-	// What a press of the button made, another press makes again.
-	const bool bLoses = HasUnsavedChanges() && TargetDiffersFrom(m_MadeTarget);
-	if (!bLoses || !m_pHostRules || m_pHostRules->MayReplaceTargetSubject(i_pAction))
-		return true;
-	Ignore(i_pCommand, RetargetSetup::Ignored::c_TargetKept);
-	return false;
-}
-
-void VRetargetSetup::SetJointSymmetry(bool i_bJointSymmetry)
-{
-	if (i_bJointSymmetry == m_bJointSymmetry)
-		return;
-	m_bJointSymmetry = i_bJointSymmetry;
-	emit jointSymmetryChanged();
-}
-
-void VRetargetSetup::SetTargetRootIndex(std::uint32_t i_RootIndex, bool i_bChosen)
-{
-	m_TargetRootIndex = i_RootIndex;
-	m_bTargetRootChosen = i_bChosen;
-}
-
-void VRetargetSetup::SetTargetScale(double i_Scale)
-{
-	if (!RetargetSetup::IsUsableScale(i_Scale))
-	{
-		NVX_LOG(c_LogCategory, NVX::ELogWarning, "A scale must be a finite number above 0, not %1%: the old one stays",
-		    i_Scale);
-		return;
-	}
-	const std::shared_ptr<const VSubjectParametrised> pOld = TargetValues().m_pParametrised;
-	const std::string dropped = pOld ? RetargetSetup::DroppedParameters(*pOld) : "";
-	if (const std::string lost = dropped.empty() ? "" : RetargetSetup::LostParameters(*pOld); !lost.empty())
-	{
-		NVX_LOG(c_LogCategory, NVX::ELogWarning,
-		    "The scale stays: another one takes the place of the dynamic parameters '%1%', which the target subject "
-		    "needs",
-		    lost);
-		return;
-	}
-	m_TargetScale = i_Scale;
-	if (!pOld)
-		return;
-	if (!dropped.empty())
-		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The new scale drops the dynamic parameters '%1%'", dropped);
-	VSubjectParametrised subject = *pOld;
-	const double factor = RootFactor(i_Scale) / RootFactor(RetargetSetup::GetGlobalScale(subject));
-	RetargetSetup::SetGlobalScale(subject, i_Scale);
-	if (factor != 1.0)
-		RetargetSetup::ScaleRootHeight(subject, factor);
-	RetargetSetup::TellLowestSegment(subject, RootFactor(i_Scale));
-	SetTargetSubjectParametrised(std::move(subject));
-}
-
-void VRetargetSetup::SetNextTargetScale(double i_Scale)
-{
-	if (RetargetSetup::IsUsableScale(i_Scale))
-		m_TargetScale = i_Scale;
-}
-
-double VRetargetSetup::GetTargetScale() const
-{
-	const std::shared_ptr<const VSubjectParametrised> pSubject = TargetValues().m_pParametrised;
-	return pSubject ? RetargetSetup::GetGlobalScale(*pSubject) : 1.0;
-}
-
-bool VRetargetSetup::GetSourceTemplate(VSubject& o_rSubject) const
-{
-	return CopyOut(SourceValues().m_pSubject, o_rSubject);
-}
-
-bool VRetargetSetup::GetSourceSubject(VSubjectParametrised& o_rSubject) const
-{
-	return CopyOut(SourceValues().m_pParametrised, o_rSubject);
-}
-
-bool VRetargetSetup::GetTargetTemplate(VSubject& o_rSubject) const
-{
-	return CopyOut(TargetValues().m_pSubject, o_rSubject);
-}
-
-bool VRetargetSetup::GetTargetSubject(VSubjectParametrised& o_rSubject) const
-{
-	return CopyOut(TargetValues().m_pParametrised, o_rSubject);
-}
-
-bool VRetargetSetup::GetTargetSubjectAndData(
-    VSubjectParametrised& o_rSubject, VSubjectApplicationData& o_rApplicationData) const
-{
-	const VSubjectValues values = TargetValues();
-	return values.m_pApplicationData && CopyOut(values.m_pParametrised, o_rSubject)
-	    && CopyOut(values.m_pApplicationData, o_rApplicationData);
-}
-
-void VRetargetSetup::SetSourceSubject(VSubjectParametrised i_Parametrised, VSubjectApplicationData i_ApplicationData)
-{
-	Replace(m_SourceItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
-	    std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)));
-}
-
-bool VRetargetSetup::SetTargetSubject(VSubjectParametrised i_Parametrised, VSubjectApplicationData i_ApplicationData,
-    CoreOrlexQRTIO::VSubjectQRTExtras i_Extras)
-{
-	if (!ReplaceTargetItems(std::move(i_Parametrised),
-	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)), NewIdentities()))
-		return false;
-	m_TargetExtras = std::move(i_Extras);
-	m_TargetAtRest = TargetValues();
-	return true;
-}
-
-void VRetargetSetup::SetTargetSubjectParametrised(VSubjectParametrised i_Parametrised)
-{
-	VIdentities identities = m_Identities;
-	if (i_Parametrised.m_Targets.size() != identities.m_Targets.size())
-		identities.m_Targets.clear();
-	ReplaceTargetItems(std::move(i_Parametrised), nullptr, std::move(identities));
-}
-
-void VRetargetSetup::Ignore(const char* i_pCommand, const QString& i_rReason)
-{
-	emit commandIgnored(i_pCommand, i_rReason);
-}
-
-bool VRetargetSetup::ReplaceTarget(const char* i_pCommand, VSubjectParametrised i_Parametrised,
-    std::shared_ptr<const VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities)
-{
-	const bool bReplaced =
-	    ReplaceTargetItems(std::move(i_Parametrised), std::move(i_pApplicationData), std::move(i_Identities));
-	if (!bReplaced)
-		Ignore(i_pCommand, RetargetSetup::Ignored::c_HostRefused);
-	return bReplaced;
-}
-
-bool VRetargetSetup::ReplaceTargetItems(VSubjectParametrised i_Parametrised,
-    std::shared_ptr<const VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities)
-{
-	while (i_Identities.m_Targets.size() < i_Parametrised.m_Targets.size())
-		i_Identities.m_Targets.push_back(++m_LastIdentity);
-	// The change signal fires within, and whoever hears it may ask.
-	std::swap(m_Identities, i_Identities);
-	if (Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
-	        std::move(i_pApplicationData)))
-	{
-		emit unsavedChangesChanged();
-		return true;
-	}
-	std::swap(m_Identities, i_Identities);
-	return false;
-}
-
-std::uint64_t VRetargetSetup::TargetIdentity(std::int32_t i_TargetIndex) const
-{
-	const std::vector<std::uint64_t>& rTargets = m_Identities.m_Targets;
-	return std::uint32_t(i_TargetIndex) < rTargets.size() ? rTargets[std::size_t(i_TargetIndex)] : 0;
-}
-
-std::int32_t VRetargetSetup::TargetOfIdentity(std::uint64_t i_Identity) const
-{
-	const std::vector<std::uint64_t>& rTargets = m_Identities.m_Targets;
-	const auto found = std::find(rTargets.begin(), rTargets.end(), i_Identity);
-	return found == rTargets.end() ? -1 : std::int32_t(found - rTargets.begin());
-}
-
-VRetargetSetup::VSubjectValues VRetargetSetup::ValuesOf(const VSubjectItems& i_rItems)
-{
-	return {ItemValue<VSubject>(i_rItems.m_pSubject), ItemValue<VSubjectApplicationData>(i_rItems.m_pApplicationData),
-	    ItemValue<VSubjectParametrised>(i_rItems.m_pParametrised)};
-}
-
-template <typename T>
-CountedPointer<IFlowItem> VRetargetSetup::MakeItem(
-    const VSubjectItems& i_rItems, const char* i_pFlowType, std::shared_ptr<const T> i_pValue)
-{
-	const std::string flowType = i_pFlowType + (&i_rItems == &m_SourceItems ? c_SourceFlavour : c_TargetFlavour);
-	CountedPointer<IFlowItem> pItem = m_pItemFactory->CreateItem(flowType);
-	if (TesselPluginInterface::SetItemValue<T>(pItem, std::move(i_pValue)))
-		return pItem;
-	NVX_LOG(c_LogCategory, NVX::ELogError, "The host makes no item of type '%1%': the change is dropped", flowType);
-	return {};
-}
-
-bool VRetargetSetup::Replace(VSubjectItems& io_rItems, std::shared_ptr<const VSubjectParametrised> i_pParametrised,
-    std::shared_ptr<const VSubjectApplicationData> i_pApplicationData)
-{
-	auto pSubject = std::make_shared<VSubject>();
-	// A subject that converts in part is still shown and edited; the converter has told what is wrong with it.
-	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(*i_pParametrised, *pSubject);
-
-	VSubjectItems items = io_rItems;
-	items.m_pSubject = MakeItem<VSubject>(io_rItems, "FlowSubject", std::move(pSubject));
-	items.m_pParametrised = MakeItem(io_rItems, "FlowSubjectParametrised", std::move(i_pParametrised));
-	if (i_pApplicationData)
-	{
-		items.m_pApplicationData = MakeItem(io_rItems, "FlowSubjectApplicationData", std::move(i_pApplicationData));
-		if (!items.m_pApplicationData)
-			return false;
-	}
-	if (!items.m_pSubject || !items.m_pParametrised)
-		return false;
-	std::swap(io_rItems, items);
-	Publish();
-	return true;
-}
-
-void VRetargetSetup::Publish()
-{
-	m_pFrame = m_pFrameFactory->CreateFrame();
-	if (m_pFrame)
-	{
-		for (const VSubjectItems* const pItems : {&m_SourceItems, &m_TargetItems})
-		{
-			m_pFrame->AddItem(pItems->m_pSubject);
-			m_pFrame->AddItem(pItems->m_pApplicationData);
-			m_pFrame->AddItem(pItems->m_pParametrised);
-		}
-	}
-	else
-		NVX_LOG(c_LogCategory, NVX::ELogError, "The host makes no frame: the preview cannot follow");
-
 	if (auto pSource = SourceValues().m_pParametrised)
 		m_pSourceSegmentModel->SetSubject(std::move(pSource));
-	static const auto s_pNone = std::make_shared<const VSubjectParametrised>();
+	static const auto s_pNone = std::make_shared<const CoreOrlexTypes::VSubjectParametrised>();
 	const auto pTarget = TargetValues().m_pParametrised;
 	m_pTargetSegmentModel->SetSubject(pTarget ? pTarget : s_pNone);
 	m_pTargetModel->SetSubject(pTarget ? pTarget : s_pNone);
-	UpdatePoseNote();
-	m_ChangedSignal.Fire();
+}
+
+void VRetargetSetup::CommandIgnored(const char* i_pCommand, const std::string& i_rReason)
+{
+	emit commandIgnored(i_pCommand, QString::fromStdString(i_rReason));
+}
+
+boost::filesystem::path VRetargetSetup::LocalPath(const char* i_pCommand, const QUrl& i_rFileURL)
+{
+	// Empty for any other URL.
+	boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(i_rFileURL.toLocalFile().toStdString());
+	if (path.empty())
+		CommandIgnored(i_pCommand,
+		    RetargetSetup::Ignored::Text(
+		        RetargetSetup::Ignored::c_NotLocal, i_rFileURL.toDisplayString().toStdString()));
+	return path;
+}
+
+void VRetargetSetup::LoadTargetSubjectURL(const QUrl& i_rFileURL)
+{
+	constexpr const char* c_Command = "LoadTargetSubjectURL";
+	const boost::filesystem::path path = LocalPath(c_Command, i_rFileURL);
+	if (!path.empty() && LoadTargetSubjectBy(c_Command, path))
+		emit targetSubjectLoaded(i_rFileURL);
+}
+
+void VRetargetSetup::SaveTargetSubjectURL(const QUrl& i_rFileURL)
+{
+	constexpr const char* c_Command = "SaveTargetSubjectURL";
+	const boost::filesystem::path path = LocalPath(c_Command, i_rFileURL);
+	if (!path.empty() && SaveTargetSubjectBy(c_Command, path))
+		emit targetSubjectSaved(i_rFileURL);
 }

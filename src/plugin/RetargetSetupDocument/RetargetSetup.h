@@ -1,220 +1,56 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/SubjectQRTExtras.h"
-#include "CoreOrlexTypes/Subject.h"
-#include "CoreOrlexTypes/SubjectApplicationData.h"
-#include "CoreOrlexTypes/SubjectParametrised.h"
-#include "FBXIO/SkinSkeleton.h"
-#include "NVX/Signal.h"
-#include "RetargetSetupDocument/BindPose.h"
+#include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupDocument/RetargetSetupSegmentModel.h"
 #include "RetargetSetupDocument/RetargetSetupTargetModel.h"
-#include "TesselPluginInterface/IDispatcher.h"
-#include "TesselPluginInterface/IFlowFrame.h"
-#include "TesselPluginInterface/IHostRules.h"
-#include "TesselPluginInterface/IItemFactory.h"
 
-#include <QByteArray>
 #include <QMatrix4x4>
 #include <QObject>
 #include <QUrl>
-#include <boost/filesystem/path.hpp>
 
 #include <memory>
-#include <optional>
-#include <string>
-#include <vector>
 
-namespace ComputeSubject
-{
-class VComputeSubjectFK;
-}
-
-/// The document of the panel: the source subject (the performer's skeleton, which is only read), the target subject
-/// (the character's, which is edited and saved) and the FBX skeleton that a target subject is made from.
-///
-/// The subjects live in six flow items, which are replaced and never changed. Every change ends in a new frame with the
-/// items, fresh list models and one firing of the change signal. There is no undo. What an operation needs and does not
-/// find (a subject, an index) ends it with no change. The commands that QML calls return nothing: one that changed
-/// nothing says why by commandIgnored, and what else the operator ought to know goes to the log. All of it runs on the
-/// user interface thread.
-class VRetargetSetup : public QObject
+/// The document as QML sees it: the properties, signals and list models of what VRetargetSetupCore keeps and does. A
+/// command that changed nothing says why by commandIgnored.
+class VRetargetSetup : public QObject, public VRetargetSetupCore
 {
 	Q_OBJECT
 	/// Read by the preview at each drag: a bind pose is mirrored to the segment on the other side.
 	Q_PROPERTY(bool jointSymmetry READ JointSymmetry WRITE SetJointSymmetry NOTIFY jointSymmetryChanged)
 	/// Read by whoever marks the file's name.
 	Q_PROPERTY(bool unsavedChanges READ HasUnsavedChanges NOTIFY unsavedChangesChanged)
-	/// The height of the root above the floor is scaled with the lengths: at once when this changes, and whenever the
-	/// scale does.
 	Q_PROPERTY(bool scaleRootHeight READ ScaleRootHeight WRITE SetScaleRootHeight NOTIFY scaleRootHeightChanged)
-	/// Why the target subject lies or stands askew as it was made, a sentence for the operator; empty if it does not,
-	/// or if its FBX file is not the one that was read last.
+	/// A sentence for the operator, or empty.
 	Q_PROPERTY(QString poseNote READ PoseNote NOTIFY poseNoteChanged)
 
 public:
-	/// A subject in its three forms. Null what there is not; shared, and never changed.
-	struct VSubjectValues
-	{
-		std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubject;
-		std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> m_pApplicationData;
-		std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pParametrised;
-	};
-
 	VRetargetSetup(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
 	    NVX::CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory,
 	    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory);
 	~VRetargetSetup() override;
 
-	/// What the host gives beyond its services; null asks nothing and has the plain form of every rule.
-	void SetHostRules(std::shared_ptr<TesselPluginInterface::IHostRules> i_pRules);
-	/// As the host has them now.
-	TesselPluginInterface::VHostRules HostRules() const;
+	// The core's commands, for QML.
 
-	/// Makes the target subject anew from the FBX skeleton, from the root bone on and with the target scale. Targets,
-	/// joint edits and bind poses of the one before are lost. It is of no file.
-	Q_INVOKABLE void CreateTargetSubject();
-	/// Takes the target subject away, as it is before the first one.
-	Q_INVOKABLE void NewTargetSubject();
+	Q_INVOKABLE void CreateTargetSubject() { VRetargetSetupCore::CreateTargetSubject(); }
+	Q_INVOKABLE void NewTargetSubject() { VRetargetSetupCore::NewTargetSubject(); }
 	Q_INVOKABLE void LoadTargetSubjectURL(const QUrl& i_rFileURL);
 	Q_INVOKABLE void SaveTargetSubjectURL(const QUrl& i_rFileURL);
+	Q_INVOKABLE void AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry)
+	{
+		VRetargetSetupCore::AddTarget(i_SourceSegmentIndex, i_TargetSegmentIndex, i_bPosition, i_bSymmetry);
+	}
+	Q_INVOKABLE void RemoveTarget(int i_TargetIndex) { VRetargetSetupCore::RemoveTarget(i_TargetIndex); }
+	Q_INVOKABLE void CreateAllJoints() { VRetargetSetupCore::CreateAllJoints(); }
+	Q_INVOKABLE void RemoveUnnecessaryJoints() { VRetargetSetupCore::RemoveUnnecessaryJoints(); }
+	Q_INVOKABLE void MatchFilePose() { VRetargetSetupCore::MatchFilePose(); }
+	Q_INVOKABLE void UpdateTargets() { VRetargetSetupCore::UpdateTargets(); }
+	Q_INVOKABLE bool HasUnsavedChanges() const { return VRetargetSetupCore::HasUnsavedChanges(); }
 
-	/// Ties a target segment to a source segment by the offset that they have in their bind poses: to its origin, or to
-	/// its orientation. With symmetry the pair on the other side is tied too, if both sides have one. Where the host
-	/// wants each pair once, a target that is there already is told by targetFound.
-	Q_INVOKABLE void AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry);
-	Q_INVOKABLE void RemoveTarget(int i_TargetIndex);
+	QString PoseNote() const { return QString::fromStdString(VRetargetSetupCore::PoseNote()); }
 
-	/// Gives every segment a joint; those that have one keep it.
-	Q_INVOKABLE void CreateAllJoints();
-
-	/// Takes the joints, but for the root's, from segments that carry no target; a Ball joint's pose goes into its
-	/// segment.
-	Q_INVOKABLE void RemoveUnnecessaryJoints();
-
-	/// Gives all segments the pose that their bones have in the FBX file, which must be the one that was read last. A
-	/// subject that is made stands so at once where the host's rules want it.
-	Q_INVOKABLE void MatchFilePose();
-
-	/// Recalculates the offset of each target from the present bind poses.
-	Q_INVOKABLE void UpdateTargets();
-
-	/// True if the target subject is not what was last loaded or saved, or was made since: closing would lose it.
-	Q_INVOKABLE bool HasUnsavedChanges() const;
-
-	bool JointSymmetry() const { return m_bJointSymmetry; }
-	void SetJointSymmetry(bool i_bJointSymmetry);
-
-	bool ScaleRootHeight() const { return m_bScaleRootHeight; }
-	void SetScaleRootHeight(bool i_bScale);
-
-	/// Reads the skeleton that CreateTargetSubject uses; no subject changes. False if the file cannot be read, then the
-	/// old skeleton stays, and if it has no skeleton.
-	bool LoadTargetFBX(const boost::filesystem::path& i_rPath);
-
-	/// Why the latest FBX file could not be read or has no skeleton, or where it broke off, as a sentence; empty if it
-	/// is whole.
-	const std::string& GetTargetFBXError() const { return m_TargetFBXError; }
-
-	/// Stem of the FBX file that the skeleton is of.
-	const std::string& GetTargetName() const { return m_TargetName; }
-
-	/// False if the latest FBX file broke off and the skeleton is what was read until then.
-	bool IsTargetFBXComplete() const { return m_bTargetFBXComplete; }
-
-	/// The segment of the target subject that stands farthest from its bone in the FBX file that was read last; nothing
-	/// if all stand where their bones do, or if they are not the bones of that file.
-	std::optional<RetargetSetup::VPoseDifference> DifferenceFromFile() const;
-
-	const QString& PoseNote() const { return m_PoseNote; }
-
-	/// Index into the FBX skeleton; takes effect with the next CreateTargetSubject.
-	/// @param i_bChosen false for a default, with which it is told that the file has other root bones.
-	void SetTargetRootIndex(std::uint32_t i_RootIndex, bool i_bChosen = true);
-
-	/// Takes effect on the target subject at once. Anything but a finite number above 0 is refused, and every scale for
-	/// a subject whose expressions use other dynamic parameters than GlobalScale, since those go; both are told.
-	void SetTargetScale(double i_Scale);
-
-	/// The scale of the next CreateTargetSubject, with no change of the target subject that is there. What
-	/// SetTargetScale refuses is ignored.
-	void SetNextTargetScale(double i_Scale);
-
-	/// The present target subject's; 1 without one.
-	double GetTargetScale() const;
-
-	/// @param i_rSkinName goes into the application data.
-	/// @return false if the file cannot be read.
-	bool LoadSourceSubject(const boost::filesystem::path& i_rPath, const std::string& i_rSkinName);
-
-	/// A file of extension ".qrx", in exactly this spelling, is a legacy text file, any other a skeleton file.
-	/// @return 0; 0x80000000 for a file that cannot be read; for a legacy file also 0x8000002A if it cannot be opened
-	/// and 0x80000018 if it is of a later version.
-	std::uint32_t LoadTargetSubject(const boost::filesystem::path& i_rPath);
-
-	/// Replaces the file only when the whole of it stands on disk.
-	/// @return 0; 0x80000020 if it could not be written; 0x8000000A without a target subject.
-	std::uint32_t SaveTargetSubject(const boost::filesystem::path& i_rPath);
-
-	void SetSourceSubject(
-	    CoreOrlexTypes::VSubjectParametrised i_Parametrised, CoreOrlexTypes::VSubjectApplicationData i_ApplicationData);
-
-	/// @param i_Extras of the file that the subject comes from.
-	/// @return false, with no change, if the host made no item.
-	bool SetTargetSubject(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
-	    CoreOrlexTypes::VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras = {});
-
-	/// An edit that leaves the application data and the extras as they are. The targets stay the ones that they are if
-	/// there are as many as before.
-	void SetTargetSubjectParametrised(CoreOrlexTypes::VSubjectParametrised i_Parametrised);
-
-	/// The values without copies.
-	VSubjectValues SourceValues() const { return ValuesOf(m_SourceItems); }
-	VSubjectValues TargetValues() const { return ValuesOf(m_TargetItems); }
-
-	/// What the targets are told apart by, whatever places they move to: one that is removed takes its number along. A
-	/// subject that replaces another brings new ones. 0 for a target that is not there.
-	std::uint64_t TargetIdentity(std::int32_t i_TargetIndex) const;
-	/// Where the target stands now; -1 if it is gone.
-	std::int32_t TargetOfIdentity(std::uint64_t i_Identity) const;
-	/// Another one after each subject that was made, loaded or set as a whole; 0 without a target subject.
-	std::uint64_t TargetSubjectIdentity() const { return m_Identities.m_Subject; }
-
-	/// The target subject as it was made, loaded or given the pose of its FBX file, whichever was last.
-	const VSubjectValues& TargetAtRest() const { return m_TargetAtRest; }
-
-	/// Copies; false, with nothing copied, if there is none.
-	bool GetSourceTemplate(CoreOrlexTypes::VSubject& o_rSubject) const;
-	bool GetSourceSubject(CoreOrlexTypes::VSubjectParametrised& o_rSubject) const;
-	bool GetTargetTemplate(CoreOrlexTypes::VSubject& o_rSubject) const;
-	bool GetTargetSubject(CoreOrlexTypes::VSubjectParametrised& o_rSubject) const;
-	bool GetTargetSubjectAndData(CoreOrlexTypes::VSubjectParametrised& o_rSubject,
-	    CoreOrlexTypes::VSubjectApplicationData& o_rApplicationData) const;
-
-	/// What the target subject's file holds beyond the subject; empty for a subject that was made here.
-	const CoreOrlexQRTIO::VSubjectQRTExtras& GetTargetExtras() const { return m_TargetExtras; }
-
-	/// Stem of the source skeleton's file, or what the target subject's file tells of it.
-	const std::string& GetSourceName() const { return m_SourceName; }
-	/// Stem of the file that the present source subject is from, empty without one. It stays when a target subject's
-	/// file tells of another source.
-	const std::string& GetShownSourceName() const { return m_ShownSourceName; }
 	std::shared_ptr<VRetargetSetupSegmentModel> GetSourceSegmentModel() const { return m_pSourceSegmentModel; }
 	std::shared_ptr<VRetargetSetupSegmentModel> GetTargetSegmentModel() const { return m_pTargetSegmentModel; }
 	std::shared_ptr<VRetargetSetupTargetModel> GetTargetModel() const { return m_pTargetModel; }
-
-	/// Null before the first FBX file, and after one without a skeleton.
-	std::shared_ptr<const FBXIO::VSkinSkeleton> GetFBXSkeleton() const { return m_pFBXSkeleton; }
-
-	/// Turns the FBX file's space into one with Z up.
-	const Rotation::VMatrix4& GetTargetAxisMatrix() const { return m_TargetAxisMatrix; }
-
-	/// Fires at the end of every change, before LoadTargetSubject has taken over the source name: callbacks go through
-	/// a dispatcher and read what stands when they run.
-	NVX::VSignal<>& GetChangedSignal() { return m_ChangedSignal; }
-
-	/// Null before the first change.
-	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> GetCurrentFrame() const { return m_pFrame; }
 
 signals:
 	void jointSymmetryChanged();
@@ -242,113 +78,23 @@ signals:
 	void commandIgnored(const QString& i_rCommand, const QString& i_rReason);
 
 private:
-	struct VSubjectItems
-	{
-		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pSubject;
-		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pApplicationData;
-		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pParametrised;
-	};
+	/// Fresh list models.
+	void Published() override;
+	void JointSymmetryChanged() override { emit jointSymmetryChanged(); }
+	void PoseNoteChanged() override { emit poseNoteChanged(); }
+	void ScaleRootHeightChanged() override { emit scaleRootHeightChanged(); }
+	void UnsavedChangesChanged() override { emit unsavedChangesChanged(); }
+	void TargetSubjectCreated() override { emit targetSubjectCreated(); }
+	void TargetFound(int i_TargetIndex) override { emit targetFound(i_TargetIndex); }
+	void CommandIgnored(const char* i_pCommand, const std::string& i_rReason) override;
 
-	/// SaveTargetSubject.
-	/// @param o_rReason why it failed.
-	std::uint32_t Save(const boost::filesystem::path& i_rPath, std::string& o_rReason);
+	/// Empty, and the command is ignored, if the URL is not of a local file.
+	boost::filesystem::path LocalPath(const char* i_pCommand, const QUrl& i_rFileURL);
 
-	struct VIdentities
-	{
-		std::uint64_t m_Subject = 0;
-		std::vector<std::uint64_t> m_Targets;
-	};
-
-	/// Asks the host before changes that are not saved are lost. False, and the command is ignored, if they stay.
-	/// @param i_pAction the command in the operator's words.
-	bool MayReplaceTarget(const char* i_pCommand, const char* i_pAction);
-
-	/// False without a target subject.
-	bool TargetDiffersFrom(const VSubjectValues& i_rKept) const;
-
-	/// Keeps what the target subject's file holds from now on.
-	void RememberTargetFile(const boost::filesystem::path& i_rPath);
-	/// Asks the host before a change of another program is overwritten.
-	bool MayOverwrite(const boost::filesystem::path& i_rPath) const;
-
-	/// Emits commandIgnored.
-	void Ignore(const char* i_pCommand, const QString& i_rReason);
-
-	/// Replaces the target subject at the end of a command, which is ignored if the host made no item.
-	bool ReplaceTarget(const char* i_pCommand, CoreOrlexTypes::VSubjectParametrised i_Parametrised,
-	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities);
-
-	/// Replace for the target subject.
-	/// @param i_Identities of the first targets; the others are new.
-	bool ReplaceTargetItems(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
-	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities);
-	VIdentities NewIdentities() { return {++m_LastIdentity, {}}; }
-
-	/// The source subject at rest in its bind pose; null if it has none. Kept until the source subject is another one.
-	const ComputeSubject::VComputeSubjectFK* SourceKinematics();
-
-	/// Of the FBX file that was read last, the bones that the target subject's segments were made of; empty if it was
-	/// made of another file.
-	FBXIO::VSkinSkeleton BonesOfTarget() const;
-	void UpdatePoseNote();
-	/// What the root's height is multiplied by at a scale.
-	double RootFactor(double i_Scale) const { return m_bScaleRootHeight ? i_Scale : 1.0; }
-
-	static VSubjectValues ValuesOf(const VSubjectItems& i_rItems);
-
-	/// Replaces the items of one subject and publishes.
-	/// @param i_pApplicationData null keeps the item that is there.
-	/// @return false, with no change, if the host made no item.
-	bool Replace(VSubjectItems& io_rItems, std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> i_pParametrised,
-	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData);
-	void Publish();
-
-	template <typename T>
-	NVX::CountedPointer<TesselPluginInterface::IFlowItem> MakeItem(
-	    const VSubjectItems& i_rItems, const char* i_pFlowType, std::shared_ptr<const T> i_pValue);
-
-	const std::shared_ptr<TesselPluginInterface::IDispatcher> m_pDispatcher;
-	const NVX::CountedPointer<TesselPluginInterface::IFrameFactory> m_pFrameFactory;
-	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
-	std::shared_ptr<TesselPluginInterface::IHostRules> m_pHostRules;
 	const std::shared_ptr<VRetargetSetupSegmentModel> m_pSourceSegmentModel;
 	const std::shared_ptr<VRetargetSetupSegmentModel> m_pTargetSegmentModel;
 	const std::shared_ptr<VRetargetSetupTargetModel> m_pTargetModel;
-	std::shared_ptr<const FBXIO::VSkinSkeleton> m_pFBXSkeleton;
-	std::string m_TargetName;
-	std::string m_TargetFBXError;
-	std::string m_SourceName;
-	std::string m_ShownSourceName;
-	QString m_PoseNote;
-	VSubjectItems m_SourceItems;
-	VSubjectItems m_TargetItems;
-	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame;
 	/// Set by nothing and read by nothing, as is the spare flag.
 	QMatrix4x4 m_SpareMatrix;
-	Rotation::VMatrix4 m_TargetAxisMatrix;
-	std::uint32_t m_TargetRootIndex = 0;
-	double m_TargetScale = 1.0;
 	[[maybe_unused]] bool m_bSpare = false;
-	bool m_bJointSymmetry = true;
-	bool m_bScaleRootHeight = false;
-	NVX::VSignal<> m_ChangedSignal;
-
-	/// What the file held when it was last loaded or saved.
-	VSubjectValues m_SavedTarget;
-	/// Where that file is, and a digest of what it held then; empty for no file.
-	boost::filesystem::path m_TargetFile;
-	QByteArray m_TargetFileDigest;
-	/// As CreateTargetSubject left it.
-	VSubjectValues m_MadeTarget;
-
-	VSubjectValues m_TargetAtRest;
-
-	std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pSourceFK;
-	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubjectOfSourceFK;
-	CoreOrlexQRTIO::VSubjectQRTExtras m_TargetExtras;
-	VIdentities m_Identities;
-	std::uint64_t m_LastIdentity = 0;
-	bool m_bTargetFBXComplete = true;
-	/// The root bone was chosen since the FBX file was read.
-	bool m_bTargetRootChosen = false;
 };

@@ -1,6 +1,6 @@
 #include "RetargetSetupDocument/RetargetSetupSelection.h"
 
-#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupCore/Identity.h"
 #include "TesselPluginInterface/IDispatcher.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 

@@ -1,7 +1,7 @@
 #include "RetargetSetupDocument/RetargetSetupTargetModel.h"
 
 #include "NVX/SelectionItemVariant.h"
-#include "RetargetSetupDocument/RetargetTargets.h"
+#include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupDocument/RoleNames.h"
 
 #include <QtQml>

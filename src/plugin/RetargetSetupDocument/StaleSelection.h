@@ -1,6 +1,6 @@
 #pragma once
 
-class VRetargetSetup;
+class VRetargetSetupCore;
 
 namespace TesselPluginInterface
 {
@@ -21,7 +21,7 @@ struct VReplacedSubjects
 /// targets whose index lies beyond their list, and all of a replaced subject. Otherwise an item of an older subject
 /// would come to life with a later one. Items of other kinds and other subjects stay. To be called on each change of
 /// the document.
-void DropStaleItems(const VRetargetSetup& i_rDocument, TesselPluginInterface::ISelectionManager& io_rManager,
+void DropStaleItems(const VRetargetSetupCore& i_rDocument, TesselPluginInterface::ISelectionManager& io_rManager,
     const VReplacedSubjects& i_rReplaced = {});
 
 } // namespace RetargetSetup

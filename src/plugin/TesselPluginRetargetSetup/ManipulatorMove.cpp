@@ -2,9 +2,9 @@
 
 #include "CoreGraphics/QtForm.h"
 #include "CoreOrlexTypes/JointType.h"
-#include "RetargetSetupDocument/AngleAxis.h"
-#include "RetargetSetupDocument/Mirror.h"
-#include "RetargetSetupDocument/RetargetTargets.h"
+#include "RetargetSetupCore/AngleAxis.h"
+#include "RetargetSetupCore/Mirror.h"
+#include "RetargetSetupCore/RetargetTargets.h"
 
 #include <algorithm>
 

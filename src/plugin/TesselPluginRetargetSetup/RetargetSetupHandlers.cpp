@@ -4,9 +4,9 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "OrlexQtQuick/GuardedCallback.h"
-#include "RetargetSetupDocument/FilePath.h"
-#include "RetargetSetupDocument/GlobalScale.h"
-#include "RetargetSetupDocument/Identity.h"
+#include "RetargetSetupCore/FilePath.h"
+#include "RetargetSetupCore/GlobalScale.h"
+#include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/RetargetSetupSelection.h"
 #include "TesselParameters/Parameter.h"

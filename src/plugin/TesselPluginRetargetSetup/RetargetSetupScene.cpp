@@ -5,9 +5,9 @@
 #include "Flow2TypesUtils/ParameterSet.h"
 #include "OrlexGraphics/manipulator/RenderManipulator.h"
 #include "OrlexGraphics/skins/SkinCache.h"
-#include "RetargetSetupDocument/Identity.h"
-#include "RetargetSetupDocument/Mirror.h"
-#include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupCore/Identity.h"
+#include "RetargetSetupCore/Mirror.h"
+#include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupDocument/StaleSelection.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "TesselPluginRetargetSetup/ManipulatorMove.h"
@@ -38,7 +38,7 @@ ISelectionItem TargetSegment(std::size_t i_Index)
 VRetargetSetupScene::VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pGraphicsContext,
     std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
     std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager,
-    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache, std::shared_ptr<VRetargetSetup> i_pRetargetSetup,
+    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache, std::shared_ptr<VRetargetSetupCore> i_pRetargetSetup,
     NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory, bool i_bAllowHiddenPick)
     : VFlowScene(std::move(i_pGraphicsContext), std::move(i_pSelectionManager), std::move(i_pSkinCache),
         std::move(i_pDispatcher), i_bAllowHiddenPick),
@@ -197,7 +197,7 @@ void VRetargetSetupScene::ComputeJointFrame(
 
 bool VRetargetSetupScene::MirrorsChange(std::size_t i_SegmentIndex, std::size_t i_MirrorIndex)
 {
-	const VRetargetSetup::VSubjectValues& rAtRest = m_pRetargetSetup->TargetAtRest();
+	const VRetargetSetupCore::VSubjectValues& rAtRest = m_pRetargetSetup->TargetAtRest();
 	if (!m_pRetargetSetup->HostRules().m_bMirrorChange || !rAtRest.m_pParametrised || !rAtRest.m_pSubject)
 		return false;
 	VMirrorRule& rRule = m_MirrorRule;
@@ -219,7 +219,7 @@ bool VRetargetSetupScene::MirrorsChange(std::size_t i_SegmentIndex, std::size_t 
 
 void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
 {
-	const VRetargetSetup::VSubjectValues target = m_pRetargetSetup->TargetValues();
+	const VRetargetSetupCore::VSubjectValues target = m_pRetargetSetup->TargetValues();
 	if (!target.m_pSubject || !target.m_pParametrised)
 		return;
 	VSubjectParametrised subject = *target.m_pParametrised;

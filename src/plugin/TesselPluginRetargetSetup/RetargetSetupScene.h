@@ -14,7 +14,7 @@
 #include <string>
 #include <vector>
 
-class VRetargetSetup;
+class VRetargetSetupCore;
 
 namespace Flow2Graphics
 {
@@ -34,7 +34,7 @@ public:
 	VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pGraphicsContext,
 	    std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
 	    std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager,
-	    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache, std::shared_ptr<VRetargetSetup> i_pRetargetSetup,
+	    std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache, std::shared_ptr<VRetargetSetupCore> i_pRetargetSetup,
 	    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory, bool i_bAllowHiddenPick);
 	~VRetargetSetupScene() override;
 
@@ -83,7 +83,7 @@ private:
 		bool m_bTold = false;
 	};
 
-	const std::shared_ptr<VRetargetSetup> m_pRetargetSetup;
+	const std::shared_ptr<VRetargetSetupCore> m_pRetargetSetup;
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
 	/// Makes what is shown of the document's frames.
 	std::shared_ptr<Flow2Graphics::VFlowSubjectSceneTransform> m_pSubjectTransform;

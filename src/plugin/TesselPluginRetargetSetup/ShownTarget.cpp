@@ -1,7 +1,7 @@
 #include "TesselPluginRetargetSetup/ShownTarget.h"
 
 #include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
-#include "RetargetSetupDocument/RetargetTargets.h"
+#include "RetargetSetupCore/RetargetTargets.h"
 #include "math/NumberText.h"
 
 #include <bit>

@@ -1,5 +1,5 @@
 #include "FBXIO/FBXReader.h"
-#include "RetargetSetupDocument/TargetConstruction.h"
+#include "RetargetSetupCore/TargetConstruction.h"
 
 #include <cstdio>
 

@@ -1,0 +1,21 @@
+#include "RetargetSetupCore/FilePath.h"
+
+#include "UtilsFileSystem/Paths.h"
+
+namespace RetargetSetup
+{
+
+std::string FileStem(const boost::filesystem::path& i_rPath)
+{
+	const std::string name = UtilsFileSystem::ToUtf8(i_rPath.filename());
+	return name.substr(0, name.rfind('.'));
+}
+
+std::string FileExtension(const boost::filesystem::path& i_rPath)
+{
+	const std::string name = UtilsFileSystem::ToUtf8(i_rPath.filename());
+	const std::size_t dot = name.rfind('.');
+	return dot == std::string::npos ? std::string() : name.substr(dot);
+}
+
+} // namespace RetargetSetup

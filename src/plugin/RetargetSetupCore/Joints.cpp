@@ -1,0 +1,91 @@
+#include "RetargetSetupCore/Joints.h"
+
+#include "CoreOrlexTypes/JointType.h"
+#include "RetargetSetupCore/ParseNumber.h"
+#include "RetargetSetupCore/TPoseConstraints.h"
+#include "math/NumberText.h"
+
+#include <algorithm>
+
+using CoreOrlexTypes::VSubjectParametrised;
+using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
+
+namespace RetargetSetup
+{
+
+namespace
+{
+
+/// Turns the segment's pre-rotation by its joint's bind pose.
+void BakeBindPose(VSubjectParametrised::VSegment& io_rSegment)
+{
+	Rotation::VVector3 preRotation{};
+	for (std::size_t i = 0; i < 3; ++i)
+	{
+		double value = 0.0;
+		if (ParseNumber(io_rSegment.m_PreRotation[i], value))
+			preRotation[i] = value;
+	}
+	Rotation::VVector3 bindPose{};
+	std::copy_n(io_rSegment.m_Joint.m_BindPose.begin(), std::min<std::size_t>(3, io_rSegment.m_Joint.m_BindPose.size()),
+	    bindPose.begin());
+	const Rotation::VVector3 baked = Rotation::AngleAxisFromRotationMatrix(Rotation::Product(
+	    Rotation::RotationMatrixFromAngleAxis(bindPose), Rotation::RotationMatrixFromAngleAxis(preRotation)));
+	for (std::size_t i = 0; i < 3; ++i)
+		io_rSegment.m_PreRotation[i] = NumberText::PrintF(baked[i]);
+}
+
+std::vector<bool> SegmentsWithTargets(const VSubjectParametrised& i_rSubject)
+{
+	std::vector<bool> used(i_rSubject.m_Segments.size());
+	for (const VSubjectParametrised::VTarget& rTarget : i_rSubject.m_Targets)
+		if (rTarget.m_SegmentIndices.size() == 1 && rTarget.m_SegmentIndices.front() < used.size())
+			used[rTarget.m_SegmentIndices.front()] = true;
+	return used;
+}
+
+} // namespace
+
+void DefaultCovariance(VJoint& io_rJoint)
+{
+	io_rJoint.m_Covariance = CoreOrlexTypes::DefaultCovariance(io_rJoint.m_JointType);
+}
+
+void EnableJoint(VSubjectParametrised& io_rSubject, std::size_t i_SegmentIndex, const Rotation::VVector3& i_rRotation)
+{
+	VJoint& rJoint = io_rSubject.m_Segments[i_SegmentIndex].m_Joint;
+	if (rJoint.m_JointType != VJoint::EDummy)
+		return;
+	const VJoint::EJointType type = i_SegmentIndex == 0 ? VJoint::EFree : VJoint::EBall;
+	rJoint.m_JointType = type;
+	rJoint.m_Mean.assign(CoreOrlexTypes::StateSize(type), 0.0);
+	std::copy(i_rRotation.begin(), i_rRotation.end(), rJoint.m_Mean.begin());
+	rJoint.m_BindPose = rJoint.m_Mean;
+	DefaultCovariance(rJoint);
+}
+
+void EnableAllJoints(VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras)
+{
+	const VTPoseShares shares(io_rSubject, io_rExtras);
+	for (std::size_t i = 1; i < io_rSubject.m_Segments.size(); ++i)
+		EnableJoint(io_rSubject, i, {});
+	shares.Restore(io_rSubject, io_rExtras);
+}
+
+void RemoveJointsWithoutTargets(VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras)
+{
+	const VTPoseShares shares(io_rSubject, io_rExtras);
+	const std::vector<bool> used = SegmentsWithTargets(io_rSubject);
+	for (std::size_t i = 1; i < io_rSubject.m_Segments.size(); ++i)
+	{
+		VSubjectParametrised::VSegment& rSegment = io_rSubject.m_Segments[i];
+		if (used[i] || rSegment.m_Joint.m_JointType == VJoint::EDummy)
+			continue;
+		if (rSegment.m_Joint.m_JointType == VJoint::EBall)
+			BakeBindPose(rSegment);
+		rSegment.m_Joint = VJoint();
+	}
+	shares.Restore(io_rSubject, io_rExtras);
+}
+
+} // namespace RetargetSetup

@@ -1,0 +1,207 @@
+// The commands of VRetargetSetupCore that edit targets and joints.
+
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupCore/BindPose.h"
+#include "RetargetSetupCore/Identity.h"
+#include "RetargetSetupCore/IgnoredCommands.h"
+#include "RetargetSetupCore/Joints.h"
+#include "RetargetSetupCore/RetargetSetupCore.h"
+#include "RetargetSetupCore/RetargetTargets.h"
+
+#include <cmath>
+#include <numbers>
+
+using ComputeSubject::VComputeSubjectFK;
+using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectApplicationData;
+using CoreOrlexTypes::VSubjectParametrised;
+using RetargetSetup::c_LogCategory;
+namespace Ignored = RetargetSetup::Ignored;
+
+namespace
+{
+
+bool IsWhole(const VRetargetSetupCore::VSubjectValues& i_rValues)
+{
+	return i_rValues.m_pParametrised && i_rValues.m_pApplicationData && i_rValues.m_pSubject;
+}
+
+/// The subject must be whole.
+std::unique_ptr<VComputeSubjectFK> TargetKinematics(const VRetargetSetupCore::VSubjectValues& i_rTarget)
+{
+	return RetargetSetup::KinematicsInBindPose(*i_rTarget.m_pParametrised, *i_rTarget.m_pSubject, "target");
+}
+
+void TellNoPartner(const VSubjectParametrised& i_rSubject, std::size_t i_SegmentIndex, const char* i_pWhich)
+{
+	NVX_LOG(c_LogCategory, NVX::ELogWarning,
+	    "Segment '%1%' of the %2% subject has no partner on the other side: no mirrored target is added",
+	    i_rSubject.m_Segments[i_SegmentIndex].m_Name, i_pWhich);
+}
+
+void TellChangedPose(const VComputeSubjectFK& i_rBefore, const VSubjectParametrised& i_rAfter)
+{
+	VSubject subject;
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(i_rAfter, subject);
+	const auto pAfter = RetargetSetup::KinematicsInBindPose(i_rAfter, subject, "target");
+	if (!pAfter)
+		return;
+	const auto worst = RetargetSetup::WorstPoseDifference(
+	    RetargetSetup::SegmentPoses(i_rBefore), RetargetSetup::SegmentPoses(*pAfter));
+	if (worst)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning,
+		    "Removing joints changed the bind pose: segment '%1%' most, by %2$.1f mm and %3$.2f degrees",
+		    i_rAfter.m_Segments[worst->m_SegmentIndex].m_Name, worst->m_Distance,
+		    worst->m_Angle * 180.0 / std::numbers::pi);
+}
+
+} // namespace
+
+const VComputeSubjectFK* VRetargetSetupCore::SourceKinematics()
+{
+	const VSubjectValues source = SourceValues();
+	if (source.m_pSubject != m_pSubjectOfSourceFK)
+	{
+		m_pSourceFK.reset();
+		m_pSubjectOfSourceFK.reset();
+	}
+	if (!m_pSourceFK && source.m_pParametrised && source.m_pSubject)
+	{
+		m_pSourceFK = RetargetSetup::KinematicsInBindPose(*source.m_pParametrised, *source.m_pSubject, "source");
+		m_pSubjectOfSourceFK = source.m_pSubject;
+	}
+	return m_pSourceFK.get();
+}
+
+void VRetargetSetupCore::AddTarget(
+    int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry)
+{
+	constexpr const char* c_Command = "AddTarget";
+	const VSubjectValues source = SourceValues();
+	const VSubjectValues target = TargetValues();
+	const auto sourceIndex = std::uint32_t(i_SourceSegmentIndex);
+	const auto targetIndex = std::uint32_t(i_TargetSegmentIndex);
+	if (!source.m_pParametrised)
+		return CommandIgnored(c_Command, Ignored::c_NoSource);
+	if (!IsWhole(target))
+		return CommandIgnored(c_Command, Ignored::c_NoTarget);
+	if (sourceIndex >= source.m_pParametrised->m_Segments.size())
+		return CommandIgnored(c_Command, Ignored::c_NoSourceSegment);
+	if (targetIndex >= target.m_pParametrised->m_Segments.size())
+		return CommandIgnored(c_Command, Ignored::c_NoTargetSegment);
+	const VComputeSubjectFK* const pSourceFK = SourceKinematics();
+	if (!pSourceFK)
+		return CommandIgnored(c_Command, Ignored::c_SourceNoTree);
+	const auto pTargetFK = TargetKinematics(target);
+	if (!pTargetFK)
+		return CommandIgnored(c_Command, Ignored::c_TargetNoTree);
+
+	VSubjectParametrised subject = *target.m_pParametrised;
+	VSubjectApplicationData applicationData = *target.m_pApplicationData;
+	const bool bOnce = HostRules().m_bEachPairOnce;
+	std::vector<std::int32_t> found;
+	const auto addPair = [&](std::size_t i_Source, std::size_t i_Target)
+	{
+		const std::int32_t there = bOnce ? RetargetSetup::FindTargetPair(*target.m_pParametrised,
+		                               source.m_pParametrised->m_Segments[i_Source].m_Name, i_Target, i_bPosition)
+		                                 : -1;
+		if (there != -1)
+			return found.push_back(there);
+		RetargetSetup::AddTargetPair(
+		    *pSourceFK, *pTargetFK, i_Source, i_Target, i_bPosition, *source.m_pParametrised, subject, applicationData);
+	};
+	addPair(sourceIndex, targetIndex);
+	if (i_bSymmetry)
+	{
+		const std::int32_t sourceMirror = RetargetSetup::FindMirrorSegment(*source.m_pParametrised, sourceIndex);
+		const std::int32_t targetMirror = RetargetSetup::FindMirrorSegment(subject, targetIndex);
+		if (sourceMirror == -1)
+			TellNoPartner(*source.m_pParametrised, sourceIndex, "source");
+		if (targetMirror == -1)
+			TellNoPartner(subject, targetIndex, "target");
+		if (sourceMirror != -1 && targetMirror != -1)
+			addPair(std::size_t(sourceMirror), std::size_t(targetMirror));
+	}
+	const auto nameOf = [&applicationData](std::int32_t i_Index) -> std::string
+	{
+		const auto& rTargets = applicationData.m_Targets;
+		return std::size_t(i_Index) < rTargets.size() ? rTargets[std::size_t(i_Index)].m_Name : "";
+	};
+	if (subject.m_Targets.size() == target.m_pParametrised->m_Targets.size())
+	{
+		CommandIgnored(c_Command, Ignored::Text(Ignored::c_PairIsThere, nameOf(found.front())));
+		TargetFound(found.front());
+		return;
+	}
+	for (const std::int32_t index : found)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "There is a target '%1%' already: only the other side is added",
+		    nameOf(index));
+	ReplaceTarget(c_Command, std::move(subject),
+	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), m_Identities);
+}
+
+void VRetargetSetupCore::RemoveTarget(int i_TargetIndex)
+{
+	constexpr const char* c_Command = "RemoveTarget";
+	VSubjectParametrised subject;
+	VSubjectApplicationData applicationData;
+	if (!GetTargetSubjectAndData(subject, applicationData))
+		return CommandIgnored(c_Command, Ignored::c_NoTarget);
+	if (std::uint32_t(i_TargetIndex) >= subject.m_Targets.size())
+		return CommandIgnored(c_Command, Ignored::c_NoSelectedTarget);
+	RetargetSetup::RemoveTarget(subject, applicationData, std::uint32_t(i_TargetIndex));
+	VIdentities identities = m_Identities;
+	identities.m_Targets.erase(identities.m_Targets.begin() + i_TargetIndex);
+	ReplaceTarget(c_Command, std::move(subject),
+	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), std::move(identities));
+}
+
+void VRetargetSetupCore::UpdateTargets()
+{
+	constexpr const char* c_Command = "UpdateTargets";
+	const VSubjectValues source = SourceValues();
+	const VSubjectValues target = TargetValues();
+	if (!source.m_pParametrised)
+		return CommandIgnored(c_Command, Ignored::c_NoSource);
+	if (!IsWhole(target))
+		return CommandIgnored(c_Command, Ignored::c_NoTarget);
+	const VComputeSubjectFK* const pSourceFK = SourceKinematics();
+	if (!pSourceFK)
+		return CommandIgnored(c_Command, Ignored::c_SourceNoTree);
+	const auto pTargetFK = TargetKinematics(target);
+	if (!pTargetFK)
+		return CommandIgnored(c_Command, Ignored::c_TargetNoTree);
+	VSubjectParametrised subject = *target.m_pParametrised;
+	RetargetSetup::UpdateTargetStates(*pSourceFK, *pTargetFK, *source.m_pParametrised, subject);
+	ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities);
+}
+
+void VRetargetSetupCore::CreateAllJoints()
+{
+	constexpr const char* c_Command = "CreateAllJoints";
+	const VSubjectValues target = TargetValues();
+	if (!IsWhole(target))
+		return CommandIgnored(c_Command, Ignored::c_NoTarget);
+	VSubjectParametrised subject = *target.m_pParametrised;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
+	RetargetSetup::EnableAllJoints(subject, extras);
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities))
+		m_TargetExtras = std::move(extras);
+}
+
+void VRetargetSetupCore::RemoveUnnecessaryJoints()
+{
+	constexpr const char* c_Command = "RemoveUnnecessaryJoints";
+	const VSubjectValues target = TargetValues();
+	if (!IsWhole(target))
+		return CommandIgnored(c_Command, Ignored::c_NoTarget);
+	VSubjectParametrised subject = *target.m_pParametrised;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
+	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
+	if (const auto pBefore = RetargetSetup::KinematicsInBindPose(*target.m_pParametrised, *target.m_pSubject, "target"))
+		TellChangedPose(*pBefore, subject);
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities))
+		m_TargetExtras = std::move(extras);
+}
