@@ -96,6 +96,25 @@ TEST(Fbx, ShowsWhatTheReaderFinds)
 	EXPECT_EQ(shared.at("skin").at("meshes")[0].at("vertexCount"), 573u);
 }
 
+TEST(Take, ShowsWhatTheFileHolds)
+{
+	const std::string file = Data("motion/chest_yxz_120fps.bvh");
+	RunRows({
+	    {"table", {"take", file}, 0, "61 frames at 120 Hz (0.51 s), 23 joints, 72 channels; in the file y is up", ""},
+	    {"tree", {"take", file}, 0, "    9                RightElbow     319.0  rotation ZXY\n", ""},
+	    {"guess", {"take", file, "-v"}, 0, "a unit 10.000 mm\n", "information TakeIO: Taken as being in cm (10 mm)"},
+	    {"rate", {"take", file, "--rate", "60"}, 0, "31 frames at 60 Hz", ""},
+	    {"json", {"take", file, "--json", "--unit", "inch"}, 0,
+	        "{\n \"frames\": 61,\n \"rate\": 120.0,\n \"channels\": 72,\n \"up\": \"y\",\n \"unit\": 25.4,", ""},
+	    {"axes", {"take", file, "--json", "--up", "z", "--unit", "2"}, 0, "\"rest\": [0.0, 20.9447, -0.000778]", ""},
+	    {"no unit", {"take", file, "--unit", "yard"}, 2, "", "\"yard\" is none of mm, cm, m, inch, and no number of"},
+	    {"no axis", {"take", file, "--up", "x"}, 2, "", "x not in {y,z}"},
+	    {"no rate", {"take", file, "--rate", "0"}, 2, "", "\"0\" is no number from 0.001 to 100000"},
+	    {"no take", {"take", Data("motion/README.md")}, 3, "", "could not be read as a take. It is no BVH file"},
+	    {"missing", {"take", "nothing.bvh"}, 3, "", "\"nothing.bvh\" could not be read as a take."},
+	});
+}
+
 TEST(Dump, SpellsAsTheSchemaDoes)
 {
 	const VScratchFolder folder;

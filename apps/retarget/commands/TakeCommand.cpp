@@ -1,0 +1,163 @@
+#include "CommandLineText/Messages.h"
+#include "retarget/commands/Commands.h"
+#include "retarget/text/Output.h"
+#include "retarget/text/Table.h"
+
+#include "TakeIO/Limits.h"
+#include "TakeIO/ReadTake.h"
+#include "math/NumberText.h"
+
+#include <algorithm>
+#include <cmath>
+#include <unistd.h>
+
+namespace CommandLine
+{
+namespace
+{
+
+using namespace TakeIO;
+
+constexpr std::pair<const char*, double> c_Units[]{{"mm", 1.0}, {"cm", 10.0}, {"m", 1000.0}, {"inch", 25.4}};
+
+struct VTakeCommand
+{
+	std::string m_File;
+	VTakeSettings m_Settings;
+};
+
+std::string SixDigits(double i_Number)
+{
+	std::string text;
+	NumberText::AppendG(text, i_Number, 6);
+	return text;
+}
+
+/// Empty, or what is wrong with the text; so do the next.
+std::string ParseNumber(const std::string& i_rText, double i_Least, double i_Greatest, std::optional<double>& o_rNumber)
+{
+	double number = 0.0;
+	if (!NumberText::ScanWholeReal(i_rText, number) || !(number >= i_Least && number <= i_Greatest))
+		return "\"" + i_rText + "\" is no number from " + SixDigits(i_Least) + " to " + SixDigits(i_Greatest);
+	o_rNumber = number;
+	return {};
+}
+
+std::string ParseUnit(const std::string& i_rText, std::optional<double>& o_rUnit)
+{
+	const auto* const pFound =
+	    std::ranges::find_if(c_Units, [&i_rText](const auto& i_rUnit) { return i_rUnit.first == i_rText; });
+	if (pFound == std::end(c_Units))
+		return ParseNumber(i_rText, Limits::c_LeastUnit, Limits::c_GreatestUnit, o_rUnit).empty()
+		    ? std::string()
+		    : "\"" + i_rText + "\" is none of mm, cm, m, inch, and no number of millimetres";
+	o_rUnit = pFound->second;
+	return {};
+}
+
+const char* UpText(const VTake& i_rTake)
+{
+	return i_rTake.m_FileUp == EUp::Y ? "y" : "z";
+}
+
+VJson TakeToJson(const VTake& i_rTake)
+{
+	VJson json{{"frames", i_rTake.m_Frames}, {"rate", i_rTake.m_Rate}, {"channels", i_rTake.m_Channels},
+	    {"up", UpText(i_rTake)}, {"unit", i_rTake.m_FileUnit}, {"joints", VJson::array()}};
+	for (const VJoint& rJoint : i_rTake.m_Joints)
+	{
+		VJson channels = VJson::array();
+		for (const EChannel channel : rJoint.m_Channels)
+			channels.push_back(c_ChannelNames[std::size_t(channel)]);
+		json["joints"].push_back({{"name", rJoint.m_Name}, {"parent", rJoint.m_Parent}, {"rest", rJoint.m_Rest.t},
+		    {"channels", std::move(channels)}, {"ends", rJoint.m_Ends}});
+	}
+	return json;
+}
+
+/// "position, rotation ZYX", with one axis or two where there are no more.
+std::string ChannelText(const VJoint& i_rJoint)
+{
+	std::string axes[2];
+	for (const EChannel channel : i_rJoint.m_Channels)
+		axes[IsRotation(channel) ? 1 : 0] += char('X' + AxisOf(channel));
+	std::string text = axes[0].empty() ? "" : "position " + axes[0];
+	if (!axes[1].empty())
+		text += (text.empty() ? "rotation " : ", rotation ") + axes[1];
+	return text;
+}
+
+std::string TakeText(const VTake& i_rTake)
+{
+	const double seconds = double(i_rTake.m_Frames) / i_rTake.m_Rate;
+	std::string text = std::to_string(i_rTake.m_Frames) + " frames at " + SixDigits(i_rTake.m_Rate) + " Hz ("
+	    + Fixed(seconds, 2) + " s), " + std::to_string(i_rTake.m_Joints.size()) + " joints, "
+	    + std::to_string(i_rTake.m_Channels) + " channels; in the file " + UpText(i_rTake) + " is up and a unit "
+	    + Fixed(i_rTake.m_FileUnit, 3) + " mm\n";
+	VTable table;
+	table.AddColumn("INDEX", VTable::ERight);
+	table.AddColumn("NAME", VTable::ELeft);
+	table.AddColumn("LENGTH", VTable::ERight);
+	table.AddColumn("CHANNELS", VTable::ELeft);
+	std::vector<std::size_t> depths;
+	for (const VJoint& rJoint : i_rTake.m_Joints)
+	{
+		depths.push_back(rJoint.m_Parent < 0 ? 0 : depths[std::size_t(rJoint.m_Parent)] + 1);
+		const auto [x, y, z] = rJoint.m_Rest.t;
+		// A deep tree is one of the hostile; its names are to be read all the same.
+		table.AddRow({std::to_string(depths.size() - 1),
+		    std::string(2 * std::min<std::size_t>(depths.back(), 40), ' ') + rJoint.m_Name,
+		    Fixed(rJoint.m_Parent < 0 ? 0.0 : std::hypot(x, y, z), 1), ChannelText(rJoint)});
+	}
+	return text + table.Text(HasColours(STDOUT_FILENO));
+}
+
+EExitStatus ShowTake(const VTakeCommand& i_rCommand)
+{
+	VTake take;
+	std::string error;
+	if (!ReadTake(i_rCommand.m_File, i_rCommand.m_Settings, take, error))
+		throw VCommandError(EBadInput, "\"" + i_rCommand.m_File + "\" could not be read as a take. " + error);
+	RequireNoErrors();
+	PrintResult(TakeToJson(take), TakeText(take));
+	return EFine;
+}
+
+} // namespace
+
+VCommand AddTakeCommand(CLI::App& io_rProgram)
+{
+	CLI::App* const pApp = AddCommand(io_rProgram, "take",
+	    "Show what recorded motion (BVH) holds: frames and rate, and the joints as a tree with length in mm from the "
+	    "parent and channels, in our axes (Z up). What the file does not tell is guessed from its rest pose, and told",
+	    {"take walk.bvh", "take walk.bvh --unit cm --up z", "take walk.bvh --json | jq .rate"});
+	const auto pCommand = std::make_shared<VTakeCommand>();
+	pApp->add_option("FILE", pCommand->m_File, "Take: BVH file")->required();
+	pApp->add_option_function<std::string>(
+	        "--up",
+	        [pCommand](const std::string& i_rAxis) { pCommand->m_Settings.m_Up = i_rAxis == "y" ? EUp::Y : EUp::Z; },
+	        "The file's axis that points up: y or z; without it the one along which the skeleton reaches further")
+	    ->check(CLI::IsMember({"y", "z"}))
+	    ->type_name("AXIS");
+	const auto addNumber = [pApp](const char* i_pName, const char* i_pType, const char* i_pHelp, const auto& i_rParse)
+	{
+		pApp->add_option_function<std::string>(
+		        i_pName,
+		        [i_pName, i_rParse](const std::string& i_rText)
+		        {
+			        if (const std::string wrong = i_rParse(i_rText); !wrong.empty())
+				        throw CLI::ValidationError(i_pName, wrong);
+		        },
+		        i_pHelp)
+		    ->type_name(i_pType);
+	};
+	addNumber("--unit", "UNIT",
+	    "The file's unit: mm, cm, m, inch or a number of millimetres; without it the one that fits the hips",
+	    [pCommand](const std::string& i_rText) { return ParseUnit(i_rText, pCommand->m_Settings.m_Unit); });
+	addNumber("--rate", "HZ", "Frames a second that the take is brought to; without it the file's own",
+	    [pCommand](const std::string& i_rText)
+	    { return ParseNumber(i_rText, Limits::c_LeastRate, Limits::c_GreatestRate, pCommand->m_Settings.m_Rate); });
+	return {pApp, [pCommand] { return ShowTake(*pCommand); }};
+}
+
+} // namespace CommandLine

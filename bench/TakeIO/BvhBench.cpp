@@ -1,0 +1,76 @@
+// Takes: a BVH file from memory on, beside from_chars over its numbers alone; and the world poses of a frame.
+#include "../Ratios.h"
+
+#include "TakeIO/ReadTake.h"
+
+#include <charconv>
+#include <cmath>
+
+namespace
+{
+
+/// A body of 31 joints with 96 channels as exporters print them: six digits behind the point.
+std::string Bvh(std::int64_t i_Frames)
+{
+	std::string text = "HIERARCHY\nROOT joint\n{\nOFFSET 0 90 0\nCHANNELS 6 Xposition Yposition Zposition Zrotation "
+	                   "Yrotation Xrotation\n";
+	for (int i = 0; i < 30; ++i)
+		text += "JOINT joint" + std::to_string(i) + "\n{\nOFFSET 0 -3 0\nCHANNELS 3 Zrotation Yrotation Xrotation\n";
+	text += std::string(31, '}') + "\nMOTION\nFrames: " + std::to_string(i_Frames) + "\nFrame Time: .0083333\n";
+	for (std::int64_t frame = 0; frame < i_Frames; ++frame)
+		for (int channel = 0; channel < 96; ++channel)
+			text += std::to_string(60.0 * std::sin(0.01 * double(frame * (channel + 3)))) + (channel < 95 ? ' ' : '\n');
+	return text;
+}
+
+const TakeIO::VTakeSettings c_Settings{TakeIO::EUp::Y, 10.0, {}};
+
+void ReadBvh(benchmark::State& io_rState)
+{
+	const std::string text = Bvh(io_rState.range(0));
+	TakeIO::VTake take;
+	std::string error;
+	for (auto _ : io_rState)
+		if (!TakeIO::ReadTakeFrom(text, c_Settings, take, error))
+			io_rState.SkipWithError(error.c_str());
+}
+
+void FromChars(benchmark::State& io_rState)
+{
+	const std::string text = Bvh(io_rState.range(0));
+	const char* const pEnd = text.data() + text.size();
+	for (auto _ : io_rState)
+	{
+		std::vector<double> numbers;
+		numbers.reserve(std::size_t(io_rState.range(0)) * 96);
+		const char* p = text.data() + text.find(".0083333\n") + 9;
+		for (double number; p < pEnd; ++p)
+		{
+			p = std::from_chars(p, pEnd, number).ptr;
+			numbers.push_back(number);
+		}
+		benchmark::DoNotOptimize(numbers.data());
+	}
+}
+
+void WorldPoses(benchmark::State& io_rState)
+{
+	TakeIO::VTake take;
+	std::string error;
+	TakeIO::ReadTakeFrom(Bvh(io_rState.range(0)), c_Settings, take, error);
+	std::vector<TakeIO::VJointPose> poses;
+	std::size_t frame = 0;
+	for (auto _ : io_rState)
+		TakeIO::WorldPoses(take, frame = (frame + 1) % take.m_Frames, poses);
+}
+
+BENCHMARK(ReadBvh)->Arg(500)->Arg(5000);
+BENCHMARK(FromChars)->Arg(500)->Arg(5000);
+BENCHMARK(WorldPoses)->Arg(500);
+
+} // namespace
+
+int main(int i_Count, char** i_ppArguments)
+{
+	return Ratios::Main(i_Count, i_ppArguments, {{"ReadBvh", "FromChars", 1.5}});
+}
