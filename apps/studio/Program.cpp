@@ -120,6 +120,8 @@ int RunWindow(QApplication& io_rApplication, const VOptions& i_rOptions)
 	if (i_rOptions.m_Size.isValid())
 		window.resize(i_rOptions.m_Size);
 	window.show();
+	if (!bScreenshot)
+		window.OfferLeftWork();
 	for (const QString& rFile : i_rOptions.m_Files)
 		window.Open(rFile);
 	if (!bScreenshot)

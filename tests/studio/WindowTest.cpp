@@ -9,6 +9,7 @@
 #include "studio/host/Services.h"
 #include "studio/log/LogModel.h"
 #include "studio/panel/RetargetPanel.h"
+#include "studio/panel/WorkKeeper.h"
 #include "studio/window/PreferencesDialog.h"
 #include "studio/window/StudioWindow.h"
 
@@ -17,6 +18,7 @@
 #include <QAction>
 #include <QApplication>
 #include <QComboBox>
+#include <QDir>
 #include <QDockWidget>
 #include <QDropEvent>
 #include <QLabel>
@@ -35,6 +37,7 @@
 
 #include <algorithm>
 #include <functional>
+#include <map>
 
 namespace
 {
@@ -372,6 +375,80 @@ TEST_F(Window, AsksBeforeUnsavedChangesAreLost)
 	}
 	m_pWindow->show();
 	EXPECT_TRUE(m_pWindow->close()) << "all is saved";
+}
+
+TEST_F(Window, OffersWhatACrashHasLeft)
+{
+	const QString file = Path("a.qrr");
+	const QString folder = Path("unsaved-work");
+	ASSERT_TRUE(QFile::copy(c_Source, file));
+	const QByteArray saved = ReadFile(file);
+	const auto content = [&] { return QDir(folder).entryList(QDir::Files); };
+	const auto offer = [this] { m_pWindow->OfferLeftWork(); };
+
+	LoadPanel();
+	ASSERT_TRUE(m_pWindow->Open(file) && m_pWindow->Open(c_Fbx));
+	offer();
+	EXPECT_TRUE(content().isEmpty()) << "nothing is unsaved";
+	QMetaObject::invokeMethod(&Document(), "RemoveUnnecessaryJoints");
+	m_pWindow->WorkKeeper()->Keep();
+	EXPECT_TRUE(m_pWindow->WorkKeeper()->Left().empty()) << "it is this program's own";
+	// The process is gone, its files are not.
+	std::map<QString, QByteArray> left;
+	for (const QString& rName : content())
+		if (!rName.endsWith(".lock"))
+			left[rName] = ReadFile(folder + '/' + rName);
+	ASSERT_EQ(left.size(), 2u);
+	const QByteArray work = left.begin()->second;
+	const auto restart = [&]
+	{
+		Restart();
+		EXPECT_FALSE(QDir(folder).exists()) << "a clean end leaves nothing";
+		QDir().mkpath(folder);
+		for (const auto& [rName, rBytes] : left)
+			WriteFile(folder + '/' + rName, rBytes);
+		LoadPanel();
+	};
+
+	restart();
+	const QString asked = "Retarget Studio did not end cleanly, and work was not saved: " + file;
+	EXPECT_EQ(Answer(QMessageBox::Cancel, offer), asked);
+	EXPECT_EQ(content().size(), 2) << "it is asked again";
+	EXPECT_EQ(Answer(QMessageBox::Open, offer), asked);
+	RunEvents();
+	EXPECT_EQ(m_pWindow->windowTitle(), "a.qrr[*] - Retarget Studio");
+	EXPECT_TRUE(m_pWindow->isWindowModified());
+	EXPECT_EQ(Parameter("TargetFBX"), c_Fbx.toStdString());
+	EXPECT_EQ(ReadFile(file), saved);
+	ASSERT_EQ(m_pWindow->WorkKeeper()->Left().size(), 0u);
+	EXPECT_EQ(content().filter(".qrr").size(), 1) << "kept again under this program's name";
+	Action("Save").trigger();
+	EXPECT_EQ(ReadFile(file), work);
+	EXPECT_FALSE(QDir(folder).exists()) << "nothing is unsaved any more";
+
+	// Another program has written the file since.
+	restart();
+	WriteFile(file, saved + "\n");
+	QFile later(file);
+	ASSERT_TRUE(later.open(QIODevice::ReadWrite)
+	    && later.setFileTime(QDateTime::currentDateTime().addSecs(60), QFileDevice::FileModificationTime));
+	Answer(QMessageBox::Open, offer);
+	EXPECT_EQ(Answer(QMessageBox::Cancel, [this] { Action("Save").trigger(); }),
+	    file + " was changed by another program since it was last loaded or saved here. Overwrite it?");
+	EXPECT_EQ(ReadFile(file), saved + "\n");
+
+	// Whatever stands there is no way to another file, and what cannot be read stays.
+	for (auto& [rName, rBytes] : left)
+		if (rName.endsWith(".json"))
+			rBytes.replace("\"copy\": \"", "\"copy\": \"../../");
+		else
+			rBytes = "rubbish";
+	restart();
+	Answer(QMessageBox::Open, offer);
+	EXPECT_EQ(content().size(), 2);
+	EXPECT_FALSE(m_pWindow->isWindowModified());
+	Answer(QMessageBox::Discard, offer);
+	EXPECT_FALSE(QDir(folder).exists());
 }
 
 TEST_F(Window, AsksBeforeAnotherSubjectTakesThePlace)

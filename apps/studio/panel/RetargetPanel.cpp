@@ -6,6 +6,7 @@
 #include "TesselPluginInterface/IParameter.h"
 #include "TesselPluginInterface/IParameterGroup.h"
 #include "TesselPluginInterface/IParameterRegistry.h"
+#include "studio/host/UnsavedWork.h"
 #include "studio/panel/FileKind.h"
 
 #include <QAbstractItemModel>
@@ -36,7 +37,7 @@ constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubje
     {"LoadTargetSubjectURL", "Load"}, {"SaveTargetSubjectURL", "Save"}, {"AddTarget", "Add target"},
     {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"},
     {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"MatchFilePose", "Take pose from FBX"},
-    {"UpdateTargets", "Update targets"}};
+    {"UpdateTargets", "Update targets"}, {"RestoreTargetSubjectURL", "Restore"}};
 
 /// By objectName, of what can be seen.
 const QQuickItem* ItemNamed(const QQuickItem& i_rItem, const QString& i_rName)
@@ -157,10 +158,15 @@ void VRetargetPanel::MarkDrop(const QStringList& i_rPaths)
 	        {"places", places}}));
 }
 
-bool VRetargetPanel::SetParameter(const char* i_pName, const QString& i_rPath)
+std::shared_ptr<TesselPluginInterface::IParameter> VRetargetPanel::Parameter(const char* i_pName) const
 {
 	const auto pGroup = m_pParameters->Find(c_pParameterPath, c_pParameterGroup);
-	const auto pParameter = pGroup ? pGroup->Find(i_pName) : nullptr;
+	return pGroup ? pGroup->Find(i_pName) : nullptr;
+}
+
+bool VRetargetPanel::SetParameter(const char* i_pName, const QString& i_rPath)
+{
+	const auto pParameter = Parameter(i_pName);
 	if (!pParameter)
 	{
 		NVX_LOG("Import", NVX::ELogError, "%1% cannot be opened: the panel has no parameter %2%", i_rPath.toStdString(),
@@ -238,6 +244,39 @@ bool VRetargetPanel::HasUnsavedChanges() const
 	bool bUnsaved = false;
 	QMetaObject::invokeMethod(m_pDocument, "HasUnsavedChanges", Qt::DirectConnection, Q_RETURN_ARG(bool, bUnsaved));
 	return bUnsaved;
+}
+
+bool VRetargetPanel::WriteCopy(const QString& i_rPath) const
+{
+	bool bWritten = false;
+	QMetaObject::invokeMethod(m_pDocument, "WriteCopyURL", Qt::DirectConnection, Q_RETURN_ARG(bool, bWritten),
+	    Q_ARG(QUrl, QUrl::fromLocalFile(i_rPath)));
+	return bWritten;
+}
+
+VUnsavedWork VRetargetPanel::Work() const
+{
+	const auto text = [this](const char* i_pName)
+	{
+		const auto pParameter = Parameter(i_pName);
+		return pParameter ? QString::fromStdString(pParameter->GetValueText()) : QString();
+	};
+	const QAbstractItemModel* const pTargets = Model("TargetModel");
+	VUnsavedWork work;
+	work.m_File = CurrentFile();
+	work.m_Source = text(c_pSource);
+	work.m_Fbx = text(c_pFbx);
+	work.m_Targets = pTargets ? pTargets->rowCount() : 0;
+	return work;
+}
+
+bool VRetargetPanel::Restore(const VUnsavedWork& i_rWork)
+{
+	bool bRestored = false;
+	QMetaObject::invokeMethod(m_pDocument, "RestoreTargetSubjectURL", Qt::DirectConnection,
+	    Q_RETURN_ARG(bool, bRestored), Q_ARG(QUrl, QUrl::fromLocalFile(i_rWork.m_Copy)),
+	    Q_ARG(QUrl, i_rWork.m_File.isEmpty() ? QUrl() : QUrl::fromLocalFile(i_rWork.m_File)));
+	return bRestored;
 }
 
 std::vector<NVX::ISelectionItem> VRetargetPanel::ItemsNamedIn(const QString& i_rMessage) const

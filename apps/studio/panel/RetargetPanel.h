@@ -17,13 +17,15 @@ class QWidget;
 
 namespace TesselPluginInterface
 {
+class IParameter;
 class IParameterRegistry;
-}
+} // namespace TesselPluginInterface
 
 namespace StudioHost
 {
 
 enum class EFileKind;
+struct VUnsavedWork;
 
 /// The "Retarget Setup" panel as far as this program knows it: by the names that it shows to its QML and the names of
 /// its parameters, not by its classes.
@@ -62,6 +64,13 @@ public:
 	/// The target subject would be lost. What is being typed does not count.
 	bool HasUnsavedChanges() const;
 
+	/// Writes what "Save" would write, and leaves what counts as saved as it is.
+	bool WriteCopy(const QString& i_rPath) const;
+	/// What the target subject is done with now: its file, performer and character, and how many targets it has.
+	VUnsavedWork Work() const;
+	/// A copy becomes unsaved work on its file again. False, with the reason told in the log, if it cannot be read.
+	bool Restore(const VUnsavedWork& i_rWork);
+
 	/// The segments and the target that a message names, for the selection.
 	std::vector<NVX::ISelectionItem> ItemsNamedIn(const QString& i_rMessage) const;
 
@@ -91,6 +100,7 @@ private:
 	VRetargetPanel(QWidget& i_rPanel, QObject& i_rDocument,
 	    std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters);
 
+	std::shared_ptr<TesselPluginInterface::IParameter> Parameter(const char* i_pName) const;
 	bool SetParameter(const char* i_pName, const QString& i_rPath);
 	void FollowRootItem();
 	/// A list that the panel shows to its QML; null if there is none.

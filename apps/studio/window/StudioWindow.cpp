@@ -9,15 +9,18 @@
 #include "studio/panel/PanelCommands.h"
 #include "studio/panel/RecentFiles.h"
 #include "studio/panel/RetargetPanel.h"
+#include "studio/panel/WorkKeeper.h"
 #include "studio/window/FileDrop.h"
 #include "studio/window/Named.h"
 #include "studio/window/PreferencesDialog.h"
 #include "studio/window/SkinProgress.h"
 
 #include <QCloseEvent>
+#include <QDir>
 #include <QDockWidget>
 #include <QFileInfo>
 #include <QLabel>
+#include <QLocale>
 #include <QMenu>
 #include <QMenuBar>
 #include <QMessageBox>
@@ -125,6 +128,9 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::fileUsed, m_pRecentFiles.get(), &VRecentFiles::Add);
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::saveFailed, this, &VStudioWindow::ShowSaveFailure);
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::stateChanged, this, &VStudioWindow::UpdateTitle);
+		// Beside the settings, which are another user's or test's elsewhere.
+		m_pWorkKeeper = std::make_unique<VWorkKeeper>(*m_pRetargetPanel,
+		    QFileInfo(m_rSettings.fileName()).absoluteDir().filePath(QStringLiteral("unsaved-work")));
 	}
 	UpdateTitle();
 	m_pNotice->setVisible(docks.isEmpty());
@@ -136,6 +142,7 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 
 void VStudioWindow::UnloadModule()
 {
+	m_pWorkKeeper.reset();
 	m_pRetargetPanel.reset();
 	UpdateTitle();
 	m_pGui->PanelManager().Clear();
@@ -157,6 +164,37 @@ bool VStudioWindow::Open(const QString& i_rPath)
 bool VStudioWindow::Execute(const QString& i_rCommand)
 {
 	return RunCommand(m_pGui->PanelManager().Panels(), i_rCommand);
+}
+
+void VStudioWindow::OfferLeftWork()
+{
+	if (!m_pWorkKeeper)
+		return;
+	for (const VUnsavedWork& rWork : m_pWorkKeeper->Left())
+	{
+		const QString file = rWork.m_File.isEmpty() ? tr("a retarget subject that was in no file yet") : rWork.m_File;
+		QMessageBox box(QMessageBox::Question, c_Title,
+		    tr("Retarget Studio did not end cleanly, and work was not saved: %1").arg(file),
+		    QMessageBox::Open | QMessageBox::Discard | QMessageBox::Cancel, this);
+		QStringList lines{tr("Targets: %1, kept at %2")
+		                      .arg(rWork.m_Targets)
+		                      .arg(QLocale().toString(rWork.m_Time.toLocalTime(), QLocale::ShortFormat))};
+		if (!rWork.m_Source.isEmpty())
+			lines << tr("Performer: %1").arg(rWork.m_Source);
+		if (!rWork.m_Fbx.isEmpty())
+			lines << tr("Character: %1").arg(rWork.m_Fbx);
+		box.setInformativeText(lines.join('\n'));
+		Named(&box, "LeftWork", box.text());
+		box.button(QMessageBox::Open)->setText(tr("&Take It Up Again"));
+		box.button(QMessageBox::Cancel)->setText(tr("Ask &Later"));
+		box.setDefaultButton(QMessageBox::Open);
+		const int answer = box.exec();
+		if (answer == QMessageBox::Discard)
+			VUnsavedWorkFolder::Discard(rWork);
+		// What else is left would take its place.
+		else if (answer == QMessageBox::Open && m_pWorkKeeper->Restore(rWork))
+			return;
+	}
 }
 
 void VStudioWindow::RestoreLayout()

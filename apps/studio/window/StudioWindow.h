@@ -17,6 +17,7 @@ class VPluginGui;
 class VQtDispatcher;
 class VRecentFiles;
 class VRetargetPanel;
+class VWorkKeeper;
 
 /// The window: the panels of the module, the log, the menus. It owns all services that the module is given, and ends
 /// them in the right order: panels, plug-in, services.
@@ -39,6 +40,10 @@ public:
 	/// Runs a named command on the panels.
 	bool Execute(const QString& i_rCommand);
 
+	/// Asks about work that is left of a program that did not end cleanly: it is taken up again, thrown away, or stays
+	/// where it is.
+	void OfferLeftWork();
+
 	/// As it was when the window closed last.
 	void RestoreLayout();
 
@@ -48,6 +53,8 @@ public:
 	VLogModel& Log() { return *m_pLog; }
 	/// Null without a module that has one.
 	VRetargetPanel* RetargetPanel() { return m_pRetargetPanel.get(); }
+	/// As RetargetPanel.
+	VWorkKeeper* WorkKeeper() { return m_pWorkKeeper.get(); }
 
 	void ShowPreferences();
 
@@ -94,6 +101,7 @@ private:
 	const std::unique_ptr<VPluginGui> m_pGui;
 	std::unique_ptr<VModule> m_pModule;
 	std::unique_ptr<VRetargetPanel> m_pRetargetPanel;
+	std::unique_ptr<VWorkKeeper> m_pWorkKeeper;
 	QMenu* m_pRecentMenu = nullptr;
 	QMenu* m_pPanelMenu = nullptr;
 	/// What stands in the window where there is no panel.

@@ -144,6 +144,15 @@ public:
 	/// @return 0; 0x80000020 if it could not be written; 0x8000000A without a target subject.
 	std::uint32_t SaveTargetSubject(const boost::filesystem::path& i_rPath);
 
+	/// Writes the target subject as a save would, and leaves what counts as saved as it is.
+	/// @param o_rReason why it failed.
+	bool WriteCopy(const boost::filesystem::path& i_rPath, std::string& o_rReason) const;
+
+	/// Loads a copy as unsaved work on another file.
+	/// @param i_rFile empty for none. If it was written after the copy, it counts as changed by another program.
+	/// @return as LoadTargetSubject.
+	std::uint32_t RestoreTargetSubject(const boost::filesystem::path& i_rCopy, const boost::filesystem::path& i_rFile);
+
 	void SetSourceSubject(
 	    CoreOrlexTypes::VSubjectParametrised i_Parametrised, CoreOrlexTypes::VSubjectApplicationData i_ApplicationData);
 

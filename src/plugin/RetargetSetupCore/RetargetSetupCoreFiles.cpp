@@ -19,6 +19,9 @@
 #include "RetargetSetupCore/TargetConstruction.h"
 #include "UtilsFileSystem/Files.h"
 #include "UtilsFileSystem/Paths.h"
+#include "UtilsFileSystem/SaveFile.h"
+
+#include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
 #include <cmath>
@@ -331,6 +334,38 @@ std::uint32_t VRetargetSetupCore::Save(const boost::filesystem::path& i_rPath, s
 		RememberTargetFile(i_rPath);
 	}
 	return status;
+}
+
+bool VRetargetSetupCore::WriteCopy(const boost::filesystem::path& i_rPath, std::string& o_rReason) const
+{
+	const VSubjectValues target = TargetValues();
+	std::string text;
+	std::vector<std::string> errors;
+	std::vector<std::string> warnings;
+	if (!target.m_pParametrised || !target.m_pApplicationData)
+		o_rReason = Ignored::c_NoTarget;
+	else if (!CoreOrlexQRTIO::VWriter().WriteText(*target.m_pParametrised, *target.m_pApplicationData, m_TargetExtras,
+	             CoreOrlexQRTIO::c_AutomaticVersion, text, errors, warnings))
+		o_rReason = errors.empty() ? std::string() : errors.front();
+	else
+		return UtilsFileSystem::SaveFile(i_rPath, text, o_rReason) == NVX::Status::c_Success;
+	return false;
+}
+
+std::uint32_t VRetargetSetupCore::RestoreTargetSubject(
+    const boost::filesystem::path& i_rCopy, const boost::filesystem::path& i_rFile)
+{
+	if (const std::uint32_t status = LoadTargetSubject(i_rCopy))
+		return status;
+	m_SavedTarget = {};
+	m_MadeTarget = {};
+	RememberTargetFile(i_rFile);
+	boost::system::error_code error;
+	const std::time_t written = boost::filesystem::last_write_time(i_rFile, error);
+	if (!error && m_TargetFileDigest && written > boost::filesystem::last_write_time(i_rCopy, error))
+		m_TargetFileDigest = ~*m_TargetFileDigest;
+	UnsavedChangesChanged();
+	return NVX::Status::c_Success;
 }
 
 bool VRetargetSetupCore::TargetDiffersFrom(const VSubjectValues& i_rKept) const

@@ -1,5 +1,8 @@
 #include "RetargetSetupDocument/RetargetSetup.h"
 
+#include "DebugServices/GlobalLog.h"
+#include "NVX/Status.h"
+#include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "UtilsFileSystem/Paths.h"
 
@@ -59,4 +62,33 @@ void VRetargetSetup::SaveTargetSubjectURL(const QUrl& i_rFileURL)
 	const boost::filesystem::path path = LocalPath(c_Command, i_rFileURL);
 	if (!path.empty() && SaveTargetSubjectBy(c_Command, path))
 		emit targetSubjectSaved(i_rFileURL);
+}
+
+bool VRetargetSetup::WriteCopyURL(const QUrl& i_rFileURL) const
+{
+	std::string reason;
+	if (WriteCopy(UtilsFileSystem::PathFromUtf8(i_rFileURL.toLocalFile().toStdString()), reason))
+		return true;
+	NVX_LOG(RetargetSetup::c_LogCategory, NVX::ELogInformation, "No copy of the target subject: %1%", reason);
+	return false;
+}
+
+bool VRetargetSetup::RestoreTargetSubjectURL(const QUrl& i_rCopyURL, const QUrl& i_rFileURL)
+{
+	constexpr const char* c_Command = "RestoreTargetSubjectURL";
+	const boost::filesystem::path copy = LocalPath(c_Command, i_rCopyURL);
+	if (copy.empty())
+		return false;
+	if (RestoreTargetSubject(copy, UtilsFileSystem::PathFromUtf8(i_rFileURL.toLocalFile().toStdString()))
+	    != NVX::Status::c_Success)
+	{
+		CommandIgnored(
+		    c_Command, RetargetSetup::Ignored::Text(RetargetSetup::Ignored::c_NotRead, UtilsFileSystem::ToUtf8(copy)));
+		return false;
+	}
+	if (i_rFileURL.isEmpty())
+		emit targetSubjectCreated();
+	else
+		emit targetSubjectLoaded(i_rFileURL);
+	return true;
 }

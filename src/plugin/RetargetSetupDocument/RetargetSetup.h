@@ -46,6 +46,12 @@ public:
 	Q_INVOKABLE void UpdateTargets() { VRetargetSetupCore::UpdateTargets(); }
 	Q_INVOKABLE bool HasUnsavedChanges() const { return VRetargetSetupCore::HasUnsavedChanges(); }
 
+	/// For a host that keeps what is unsaved. False, with the reason told in the log, if it could not be written.
+	Q_INVOKABLE bool WriteCopyURL(const QUrl& i_rFileURL) const;
+	/// What was kept is unsaved work on the file again, which may be empty.
+	/// @return false, with the reason told by commandIgnored, if it could not be read.
+	Q_INVOKABLE bool RestoreTargetSubjectURL(const QUrl& i_rCopyURL, const QUrl& i_rFileURL);
+
 	QString PoseNote() const { return QString::fromStdString(VRetargetSetupCore::PoseNote()); }
 
 	std::shared_ptr<VRetargetSetupSegmentModel> GetSourceSegmentModel() const { return m_pSourceSegmentModel; }
