@@ -4,6 +4,7 @@
 #include "CommandLineText/Parsing.h"
 #include "retarget/Signals.h"
 #include "retarget/commands/Commands.h"
+#include "retarget/text/Completion.h"
 #include "retarget/text/Output.h"
 
 #include "DebugServices/GlobalLog.h"
@@ -60,6 +61,20 @@ int Fail(EExitStatus i_Status, const std::string& i_rMessage)
 {
 	TellFailure(i_Status, i_rMessage);
 	return i_Status;
+}
+
+/// A shell asks this while its user types: there is nobody to tell anything.
+int Complete(const CLI::App& i_rProgram, const std::vector<std::string>& i_rArguments)
+{
+	try
+	{
+		PrintCandidates(i_rProgram, i_rArguments);
+		return EFine;
+	}
+	catch (const std::exception&)
+	{
+		return EBadInput;
+	}
 }
 
 /// What scripts ask of every command.
@@ -129,6 +144,8 @@ int Run(std::vector<std::string> i_Arguments, const VRender& i_rRender)
 {
 	LeaveNothingOnSignals();
 	VProgram program = MakeProgram(i_rRender);
+	if (!i_Arguments.empty() && i_Arguments.front() == "complete")
+		return Complete(*program.m_pApp, i_Arguments);
 	std::shared_ptr<void> pMessages = ShowMessages({});
 	try
 	{

@@ -1,4 +1,8 @@
 #include "Rows.h"
+#include "retarget/Program.h"
+#include "retarget/text/Completion.h"
+
+#include <boost/algorithm/string/replace.hpp>
 
 #include <cstdlib>
 
@@ -208,18 +212,87 @@ TEST(Usage, ReasonsOfErrors)
 	EXPECT_EQ(folder.Run({"dump", "cut.qrs", "--log", "QRTIO=error"}).m_Err, read) << "as asked";
 }
 
-TEST(Usage, CompletionKnowsTheOptionTable)
+TEST(Usage, CompletionOffersWhatMayStandThere)
 {
 	const VScratchFolder folder;
-	const VRun completion = folder.Run({"documentation", "bash"});
-	ASSERT_EQ(completion.m_Status, 0);
-	folder.Write("script",
-	    completion.m_Out
-	        + "\nask() { COMP_WORDS=(\"$@\"); COMP_CWORD=$(($#-1)); _retarget; echo \"${COMPREPLY[*]}\"; }\n"
-	          "ask retarget cr; ask retarget -q ed; ask retarget create --up; ask retarget fk x --pose m\n");
+	const auto copy = [&](const char* i_pName, const std::string& i_rFile) { folder.Write(i_pName, Get(i_rFile)); };
+	copy("a b.qrs", c_Performer);
+	copy("hero.fbx", Data("fbx/heaps_biped_zup_a7100.fbx"));
+	ASSERT_EQ(folder.Run({"create", "--fbx", "hero.fbx", "--source", "a b.qrs", "--rotation", "Head:#0", "-o", "x.qrr"})
+	              .m_Status,
+	    0);
+	const std::string create = "retarget create --fbx hero.fbx --source 'a b.qrs' --position ";
+	const std::pair<std::string, const char*> rows[] = {
+	    {"retarget cr", "create"},
+	    {"retarget -q ed", "edit"},
+	    {"retarget help conv", "convert"},
+	    {"retarget --log QRTIO=detail cr", "create"},
+	    {"retarget --log QR", "<-o nospace>QRTIO="},
+	    {"retarget fk --log QRTIO=d", "detail"},
+	    {"retarget create --up", "--update-targets"},
+	    {"retarget fk x --pose m", "mean"},
+	    {"retarget fk x --pose=t", "tpose"},
+	    {"retarget render x --view bo", "bottom"},
+	    {"retarget eval 1 --context l", "linear"},
+	    {"retarget create --root-height ", "keep scale"},
+	    {"retarget convert a b --format-version 3.5", "3.5"},
+	    {"retarget render --skins f", "<-o dirnames>"},
+	    {"retarget create --fbx h", "<-o default>"},
+	    {"retarget dump ", "<-o default>"},
+	    {"retarget dump x ", ""},
+	    {"retarget create --fbx hero.fbx --root 'Bip001 L Ca", "Bip001 L Calf"},
+	    {"retarget create --fbx hero.fbx --root Bip001\\ L\\ Ca", "Bip001\\ L\\ Calf"},
+	    {create + "Hi", "<-o nospace>Hips:"},
+	    {create + "Hips:Bip001\\ Pe", "Bip001\\ Pelvis"},
+	    {create + "'Hips:Bip001 Pe", "Hips:Bip001 Pelvis"},
+	    {create + "Nobody:", ""},
+	    {"retarget edit x.qrr --weight ", "<-o nospace>0="},
+	    {"retarget edit x.qrr --pose 'Bip001 L Ca", "<-o nospace>Bip001 L Calf="},
+	    {"retarget edit nothing.qrr --pose B", ""},
+	    {"retarget nothing --q", "--quiet"},
+	};
+	std::string script = folder.Run({"documentation", "bash"}).m_Out + "compopt() { printf '<%s>' \"$*\"; }\ncd '"
+	    + folder.Path().string() + "'\nask() { COMP_LINE=\"$1 rest\"; COMP_POINT=${#1}; _retarget '" RETARGET_PROGRAM
+	    + "'; echo \"${COMPREPLY[*]}\"; }\n";
+	std::string expected;
+	for (const auto& [rLine, pReply] : rows)
+	{
+		script += "ask \"" + boost::algorithm::replace_all_copy(rLine, "\\", "\\\\") + "\"\n";
+		expected += std::string(pReply) + "\n";
+	}
+	folder.Write("script", script);
 	EXPECT_EQ(
-	    std::system(("bash '" + (folder / "script").string() + "' > '" + (folder / "out").string() + "'").c_str()), 0);
-	EXPECT_EQ(folder.Read("out"), "create\nedit\n--update-targets\n\n");
+	    std::system(("bash '" + (folder / "script").string() + "' > '" + (folder / "out").string() + "' 2>&1").c_str()),
+	    0);
+	EXPECT_EQ(folder.Read("out"), expected);
+
+	// The other shells' scripts ask the same; where a shell is there, it takes its own.
+	EXPECT_EQ(folder.Run({"complete", "words", "fk", "x", "--pose", "m"}).m_Out, "mean\n");
+	EXPECT_EQ(folder.Run({"complete", "words", ""}).m_Out.rfind("create\tBuild a target subject ", 0), 0u);
+	EXPECT_EQ(folder.Run({"complete", "words"}).m_Out, "");
+	for (const std::string shell : {"zsh", "fish"})
+	{
+		const VRun run = folder.Run({"documentation", shell});
+		EXPECT_NE(run.m_Out.find(" complete words "), std::string::npos) << shell;
+		folder.Write(shell, run.m_Out);
+		EXPECT_EQ(std::system(
+		              ("! command -v " + shell + " > /dev/null || " + shell + " -n '" + (folder / shell).string() + "'")
+		                  .c_str()),
+		    0);
+	}
+}
+
+/// A value that completion does not know by its name in the help would silently offer nothing.
+TEST(Usage, CompletionKnowsAllValues)
+{
+	const CommandLine::VProgram program = CommandLine::MakeProgram();
+	std::vector<const CLI::App*> apps{program.m_pApp.get()};
+	for (const CommandLine::VCommand& rCommand : program.m_Commands)
+		apps.push_back(rCommand.m_pApp);
+	for (const CLI::App* const pApp : apps)
+		for (const CLI::Option* const pOption : pApp->get_options())
+			EXPECT_TRUE(CommandLine::IsKnownValue(CommandLine::ValueName(*pOption)))
+			    << pApp->get_name() << " " << CommandLine::ValueName(*pOption);
 }
 
 TEST(Usage, ManualTellsAllCommands)

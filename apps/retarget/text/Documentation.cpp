@@ -51,46 +51,6 @@ void AppendExamples(std::string& io_rPage, const CLI::App& i_rApp)
 	io_rPage += ".PP\n.nf\n" + Escaped(i_rApp.get_footer()) + "\n.fi\n";
 }
 
-std::string Words(const std::vector<std::string>& i_rWords)
-{
-	std::string text;
-	for (const std::string& rWord : i_rWords)
-		text += (text.empty() ? "" : " ") + rWord;
-	return text;
-}
-
-std::string OptionWords(const CLI::App& i_rApp, bool i_bWithValueOnly)
-{
-	std::vector<std::string> words;
-	for (const CLI::Option* pOption : i_rApp.get_options())
-	{
-		if (i_bWithValueOnly && pOption->get_expected_max() == 0)
-			continue;
-		for (const std::string& rName : pOption->get_lnames())
-			words.push_back("--" + rName);
-		for (const std::string& rName : pOption->get_snames())
-			words.push_back("-" + rName);
-	}
-	return Words(words);
-}
-
-/// Options whose value is the name of a file.
-std::string FileOptionWords(const CLI::App& i_rApp)
-{
-	std::vector<std::string> words;
-	for (const CLI::Option* pOption : i_rApp.get_options())
-	{
-		const std::string text = pOption->get_option_text();
-		if (text.rfind("FILE", 0) != 0 && text.rfind("OUT", 0) != 0)
-			continue;
-		for (const std::string& rName : pOption->get_lnames())
-			words.push_back("--" + rName);
-		for (const std::string& rName : pOption->get_snames())
-			words.push_back("-" + rName);
-	}
-	return Words(words);
-}
-
 } // namespace
 
 std::string ManualPage(const CLI::App& i_rProgram)
@@ -113,40 +73,79 @@ std::string ManualPage(const CLI::App& i_rProgram)
 	return page;
 }
 
-std::string BashCompletion(const CLI::App& i_rProgram)
+const char* BashCompletion()
 {
-	std::vector<std::string> names;
-	for (const CLI::App* pCommand : ShownCommands(i_rProgram))
-		names.push_back(pCommand->get_name());
-	std::string text = "# Completion of retarget for bash.\n_retarget()\n{\n"
-	                   "\tlocal current=\"${COMP_WORDS[COMP_CWORD]}\" previous=\"${COMP_WORDS[COMP_CWORD-1]}\"\n"
-	                   "\tlocal command=\"\" options=\"\" valued=\"\" files=\"\" word\n"
-	                   "\tfor word in \"${COMP_WORDS[@]:1:COMP_CWORD-1}\"; do\n"
-	                   "\t\tcase \"$word\" in -*) ;; *) command=\"$word\"; break ;; esac\n\tdone\n"
-	                   "\tCOMPREPLY=()\n\tcase \"$command\" in\n";
-	const auto addCase = [&](const std::string& i_rName, const CLI::App& i_rApp)
-	{
-		text += "\t" + i_rName + ")\n\t\toptions=\"" + OptionWords(i_rApp, false) + "\"\n\t\tvalued=\""
-		    + OptionWords(i_rApp, true) + "\"\n\t\tfiles=\"" + FileOptionWords(i_rApp) + "\" ;;\n";
-	};
-	for (const CLI::App* pCommand : ShownCommands(i_rProgram))
-		addCase(pCommand->get_name(), *pCommand);
-	addCase("\"\"", i_rProgram);
-	text += "\tesac\n"
-	        "\tif [[ \" $files \" == *\" $previous \"* ]]; then\n"
-	        "\t\tCOMPREPLY=($(compgen -f -- \"$current\"))\n"
-	        "\telif [[ \" $valued \" == *\" $previous \"* ]]; then\n"
-	        "\t\tCOMPREPLY=()\n"
-	        "\telif [[ $current == -* ]]; then\n"
-	        "\t\tCOMPREPLY=($(compgen -W \"$options\" -- \"$current\"))\n"
-	        "\telif [[ -z $command ]]; then\n"
-	        "\t\tCOMPREPLY=($(compgen -W \""
-	    + Words(names)
-	    + "\" -- \"$current\"))\n"
-	      "\telse\n"
-	      "\t\tCOMPREPLY=($(compgen -f -- \"$current\"))\n"
-	      "\tfi\n}\ncomplete -o filenames -F _retarget retarget\n";
-	return text;
+	return R"(# Completion of retarget for bash.
+_retarget()
+{
+	local line
+	COMPREPLY=()
+	while IFS= read -r line; do
+		case $line in
+		$'\tfiles') compopt -o default ;;
+		$'\tfolders') compopt -o dirnames ;;
+		*) COMPREPLY+=("${line%%$'\t'*}") ;;
+		esac
+	done < <("$1" complete bash "$COMP_LINE" "$COMP_POINT" 2>/dev/null)
+	case ${#COMPREPLY[@]}${COMPREPLY[0]} in 1*[:=]) compopt -o nospace ;; esac
+}
+complete -F _retarget retarget
+)";
+}
+
+const char* ZshCompletion()
+{
+	return R"(#compdef retarget
+# Completion of retarget for zsh.
+_retarget()
+{
+	local line text
+	local -a texts shown open openShown
+	for line in "${(@f)$("${(Q)words[1]}" complete words "${(@Q)words[2,CURRENT-1]}" "${(Q)PREFIX}" 2>/dev/null)}"; do
+		text="${line%%$'\t'*}"
+		case $line in
+		'') ;;
+		$'\tfiles') compset -P '--*='; _files; return ;;
+		$'\tfolders') compset -P '--*='; _files -/; return ;;
+		*[:=]) open+=("$text"); openShown+=("$text") ;;
+		*$'\t'*) texts+=("$text"); shown+=("$text  -- ${line#*$'\t'}") ;;
+		*) texts+=("$text"); shown+=("$text") ;;
+		esac
+	done
+	local missing=1
+	compadd -l -d shown -a texts && missing=0
+	compadd -S '' -d openShown -a open && missing=0
+	return missing
+}
+if [[ $funcstack[1] == _retarget ]]; then _retarget "$@"; else compdef _retarget retarget; fi
+)";
+}
+
+const char* FishCompletion()
+{
+	return R"(# Completion of retarget for fish.
+function __retarget_complete
+	set -l words (commandline -opc)
+	set -l current (commandline -ct | string unescape | string trim --left --chars "'\"")
+	set -l option (string match -r '^--[a-z-]+=' -- "$current")
+	set -l value (string replace -r '^--[a-z-]+=' '' -- "$current")
+	for line in ($words[1] complete words $words[2..-1] "$current" 2>/dev/null)
+		switch $line
+		case \tfiles
+			for path in (__fish_complete_path "$value")
+				echo $option$path
+			end
+		case \tfolders
+			for path in (__fish_complete_directories "$value")
+				echo $option$path
+			end
+		case '*'
+			echo $line
+		end
+	end
+end
+complete -c retarget -f -a '(__retarget_complete)'
+)";
 }
 
 } // namespace CommandLine
