@@ -16,7 +16,7 @@ std::string Entry(const std::string& i_rName, const std::string& i_rText)
 	const std::size_t width = TextWidth();
 	const std::size_t column = std::min(c_LargestColumn, width / 3);
 	std::string line = "  " + i_rName;
-	line += line.size() < column ? std::string(column - line.size(), ' ') : "\n" + std::string(column, ' ');
+	line += line.size() + 1 < column ? std::string(column - line.size(), ' ') : "\n" + std::string(column, ' ');
 	return line + Wrap(i_rText, width - column, column) + "\n";
 }
 
@@ -34,6 +34,12 @@ std::size_t TextWidth()
 	constexpr std::size_t c_Widest = 100;
 	const std::size_t width = TerminalWidth();
 	return width == 0 ? c_Widest : std::clamp(width, c_Narrowest, c_Widest);
+}
+
+std::string FitTerminal(const std::string& i_rText, std::size_t i_Indent)
+{
+	const std::size_t width = TerminalWidth();
+	return width <= i_Indent ? i_rText : Wrap(i_rText, width - i_Indent, i_Indent);
 }
 
 std::string FitLine(const std::string& i_rLine, std::size_t i_Width)
@@ -127,15 +133,15 @@ std::string VHelpFormatter::make_group(
 std::string VHelpFormatter::make_usage(const CLI::App* i_pApp, std::string i_Name) const
 {
 	// CLI11 hands the chain of names for a command's help.
-	std::string usage = "\nUsage: " + (i_Name.empty() ? i_pApp->get_name() : i_Name);
+	std::string usage = "Usage: " + (i_Name.empty() ? i_pApp->get_name() : i_Name);
 	for (const CLI::Option* pOption : i_pApp->get_options())
 		if (pOption->get_positional())
 			usage += " " + make_option_usage(pOption);
 	for (const CLI::Option* pOption : i_pApp->get_options())
 		if (pOption->nonpositional() && pOption->get_required())
 			usage += " " + pOption->get_name() + " " + pOption->get_option_text();
-	usage += i_pApp->get_subcommands({}).empty() ? " [OPTIONS]\n" : " COMMAND [OPTIONS]\n";
-	return usage;
+	usage += i_pApp->get_subcommands({}).empty() ? " [OPTIONS]" : " COMMAND [OPTIONS]";
+	return "\n" + Wrap(usage, TextWidth() - 4, 4) + "\n";
 }
 
 std::string VHelpFormatter::make_description(const CLI::App* i_pApp) const

@@ -18,7 +18,11 @@ std::string FitLine(const std::string& i_rLine, std::size_t i_Width);
 /// Wraps a text at blanks; lines after the first begin with the indent. Line ends in the text stay.
 std::string Wrap(const std::string& i_rText, std::size_t i_Width, std::size_t i_Indent);
 
-/// Help pages of 100 columns.
+/// Wrapped to the terminal where standard output is one, with the indent in all lines but the first; otherwise as it
+/// is.
+std::string FitTerminal(const std::string& i_rText, std::size_t i_Indent);
+
+/// Help pages as wide as the terminal, at most 100 columns.
 class VHelpFormatter : public CLI::Formatter
 {
 public:

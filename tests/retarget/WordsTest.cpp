@@ -5,6 +5,7 @@
 #include "CommandLineText/Suggest.h"
 #include "retarget/subject/Elements.h"
 #include "retarget/text/Output.h"
+#include "retarget/text/Table.h"
 
 #include "RetargetSetupCore/SideOfName.h"
 
@@ -142,6 +143,38 @@ TEST(Output, JsonHoldsWhatTextAndNumbersMayBe)
 	json["empty"] = CommandLine::VJson::array();
 	EXPECT_EQ(
 	    JsonText(json), "{\n \"list\": [1.5, null, null],\n \"text\": \"a\xEF\xBF\xBD\\\"b\",\n \"empty\": []\n}");
+}
+
+TEST(Table, FitsTheTerminal)
+{
+	VTable table;
+	table.AddColumn("INDEX", VTable::ERight);
+	table.AddColumn("NAME", VTable::ELeft);
+	table.AddColumn("LENGTH", VTable::ERight);
+	table.AddColumn("FOLLOWS", VTable::ELeft);
+	table.AddRow({"0",
+	    "H\xC3\xBC"
+	    "fte",
+	    "1.5", "Pelvis, Sacrum, Hip"});
+	table.AddRow({"1", "  Spine", "10.0", ""});
+	const std::string wide = "INDEX  NAME     LENGTH  FOLLOWS\n"
+	                         "    0  H\xC3\xBC"
+	                         "fte       1.5  Pelvis, Sacrum, Hip\n"
+	                         "    1    Spine    10.0\n";
+	EXPECT_EQ(table.Text(false), wide);
+	EXPECT_EQ(table.Text(false, 43), wide);
+	EXPECT_EQ(table.Text(false, 42),
+	    "INDEX  NAME     LENGTH  FOLLOWS\n"
+	    "    0  H\xC3\xBC"
+	    "fte       1.5  Pelvis, Sacrum,\n"
+	    "                        Hip\n"
+	    "    1    Spine    10.0\n");
+	EXPECT_EQ(table.Text(false, 24),
+	    "INDEX  NAME     LENGTH\n       FOLLOWS\n"
+	    "    0  H\xC3\xBC"
+	    "fte       1.5\n       Pelvis, Sacrum,\n       Hip\n"
+	    "    1    Spine    10.0\n");
+	EXPECT_EQ(table.Text(true, 14).rfind("\033[1mINDEX  NAME\n       LENGTH\n       FOLLOWS\033[0m\n", 0), 0u);
 }
 
 TEST(HelpFormatter, FitsLines)

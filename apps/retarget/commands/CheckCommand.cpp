@@ -1,3 +1,4 @@
+#include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/SubjectFile.h"
@@ -66,11 +67,11 @@ std::string ToText(const VFindings& i_rFindings)
 	std::string text;
 	for (const VSubjectFinding& rFinding : i_rFindings)
 	{
-		text += std::string(KindOf(rFinding.m_Element)) + " #" + std::to_string(rFinding.m_Index);
+		std::string line = std::string(KindOf(rFinding.m_Element)) + " #" + std::to_string(rFinding.m_Index);
 		if (!rFinding.m_Name.empty())
-			text += " \"" + Printable(rFinding.m_Name) + "\"";
-		text += ": " + Printable(rFinding.m_Message) + (rFinding.m_bTolerated ? " (tolerated)" : "") + "\n    "
-		    + Printable(rFinding.m_Remedy) + "\n";
+			line += " \"" + Printable(rFinding.m_Name) + "\"";
+		line += ": " + Printable(rFinding.m_Message) + (rFinding.m_bTolerated ? " (tolerated)" : "");
+		text += FitTerminal(line, 2) + "\n    " + FitTerminal(Printable(rFinding.m_Remedy), 4) + "\n";
 	}
 	return text + Count(i_rFindings.size(), "finding") + "\n";
 }

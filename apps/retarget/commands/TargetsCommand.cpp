@@ -180,7 +180,7 @@ EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)
 	VTable table = LinesToTable(lines, bResiduals, true);
 	if (!i_rSettings.m_bStates && table.LineWidth() > TerminalWidth())
 		table = LinesToTable(lines, bResiduals, false);
-	PrintResult(LinesToJson(lines, bResiduals), table.Text(HasColours(STDOUT_FILENO)));
+	PrintResult(LinesToJson(lines, bResiduals), table.Text(HasColours(STDOUT_FILENO), TerminalWidth()));
 	return EFine;
 }
 

@@ -1,3 +1,4 @@
+#include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Residuals.h"
@@ -141,7 +142,7 @@ void Show(const VTree& i_rTree, bool i_bSegments)
 		json.push_back(std::move(item));
 		table.AddRow(texts);
 	}
-	PrintResult(json, table.Text(HasColours(STDOUT_FILENO)));
+	PrintResult(json, table.Text(HasColours(STDOUT_FILENO), TerminalWidth()));
 }
 
 } // namespace
