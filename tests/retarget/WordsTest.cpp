@@ -14,6 +14,7 @@
 #include <boost/filesystem/operations.hpp>
 
 #include <limits>
+#include <map>
 #include <regex>
 #include <set>
 
@@ -54,21 +55,63 @@ TEST(Suggest, NamesTheClosestFirst)
 	EXPECT_EQ(DidYouMean("hed", {}), "");
 }
 
-/// A category that is not listed could not be given a level.
-TEST(Messages, AllCategoriesAreKnown)
+/// Calls the function with what the first group of the expression takes in each source of these folders.
+template <typename TCall>
+void ForEachInSources(const std::vector<std::string>& i_rFolders, const std::regex& i_rExpression, TCall&& i_rCall)
 {
-	const std::regex category(R"x((?:NVX_LOG\(\s*|c_p?(?:Log)?Category = |GlobalLog::Category\()"([^"/]+)")x");
-	std::set<std::string> found;
-	for (const char* pFolder : {"/src", "/apps"})
-		for (const auto& rEntry :
-		    boost::filesystem::recursive_directory_iterator(RETARGET_SOURCE + std::string(pFolder)))
+	for (const std::string& rFolder : i_rFolders)
+		for (const auto& rEntry : boost::filesystem::recursive_directory_iterator(RETARGET_SOURCE "/" + rFolder))
 			if (rEntry.path().extension() == ".cpp" || rEntry.path().extension() == ".h")
 			{
 				const std::string text = Get(rEntry.path());
-				for (std::sregex_iterator it(text.begin(), text.end(), category); it != std::sregex_iterator(); ++it)
-					found.insert((*it)[1]);
+				for (std::sregex_iterator it(text.begin(), text.end(), i_rExpression); it != std::sregex_iterator();
+				     ++it)
+					i_rCall((*it)[1].str());
 			}
+}
+
+/// A category that is not listed could not be given a level.
+TEST(Messages, AllCategoriesAreKnown)
+{
+	std::set<std::string> found;
+	ForEachInSources({"src", "apps"},
+	    std::regex(R"x((?:NVX_LOG\(\s*|c_p?(?:Log)?Category = |GlobalLog::Category\()"([^"/]+)")x"),
+	    [&](const std::string& i_rName) { found.insert(i_rName); });
 	EXPECT_EQ(found, std::set<std::string>(std::begin(c_Categories), std::end(c_Categories)));
+	const std::string page = Get(RETARGET_SOURCE "/docs/pipeline.md");
+	for (const std::string& rName : found)
+		EXPECT_NE(page.find("\n| `" + rName + "` | "), std::string::npos) << rName << " in docs/pipeline.md";
+}
+
+/// Each warning that a batch may meet has its row with cause and cure, and no row is of a warning that is gone.
+TEST(Messages, AllWarningsAreExplained)
+{
+	std::string page = Get(RETARGET_SOURCE "/docs/pipeline.md");
+	page.erase(0, page.find("## Every warning"));
+	std::map<std::string, std::size_t> rows;
+	const std::regex row("\n\\| `([^`]+)` \\| [^|]+ \\| [^|]+ \\|");
+	for (std::sregex_iterator it(page.begin(), page.end(), row); it != std::sregex_iterator(); ++it)
+		rows[(*it)[1]] = 0;
+	ForEachInSources({"apps/retarget", "src/formats", "src/plugin/RetargetSetupDocument",
+	                     "src/scene/OrlexGraphics/skins", "src/base/FileSystemWatcher"},
+	    std::regex(
+	        R"x((?:NVX::ELogWarning,\s*|(?:Warnings\.(?:Add|push_back)|AddWarning)\([^";]*)((?:"(?:[^"\\]|\\.)*"\s*)+))x"),
+	    [&](const std::string& i_rLiterals)
+	    {
+		    const std::string text = std::regex_replace(i_rLiterals, std::regex("\"\\s*\""), "");
+		    if (text.starts_with("\"%1%\""))
+			    return;
+		    bool bExplained = false;
+		    for (auto& [rPart, rUses] : rows)
+			    if (text.find(rPart) != std::string::npos)
+			    {
+				    ++rUses;
+				    bExplained = true;
+			    }
+		    EXPECT_TRUE(bExplained) << text << " is not in docs/pipeline.md";
+	    });
+	for (const auto& [rPart, uses] : rows)
+		EXPECT_GT(uses, 0u) << rPart << " is told nowhere";
 }
 
 TEST(Side, StandsInAWordOfItsOwn)
