@@ -92,8 +92,8 @@ TEST(Messages, AllWarningsAreExplained)
 	const std::regex row("\n\\| `([^`]+)` \\| [^|]+ \\| [^|]+ \\|");
 	for (std::sregex_iterator it(page.begin(), page.end(), row); it != std::sregex_iterator(); ++it)
 		rows[(*it)[1]] = 0;
-	ForEachInSources({"apps/retarget", "src/formats", "src/plugin/RetargetSetupDocument",
-	                     "src/scene/OrlexGraphics/skins", "src/base/FileSystemWatcher"},
+	ForEachInSources({"apps/retarget", "src/formats", "src/plugin/RetargetSetupCore", "src/scene/OrlexGraphics/skins",
+	                     "src/base/FileSystemWatcher"},
 	    std::regex(
 	        R"x((?:NVX::ELogWarning,\s*|(?:Warnings\.(?:Add|push_back)|AddWarning)\([^";]*)((?:"(?:[^"\\]|\\.)*"\s*)+))x"),
 	    [&](const std::string& i_rLiterals)

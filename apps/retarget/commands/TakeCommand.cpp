@@ -1,5 +1,7 @@
+#include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
 #include "retarget/commands/Commands.h"
+#include "retarget/text/InputFile.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/Table.h"
 
@@ -90,10 +92,10 @@ std::string ChannelText(const VJoint& i_rJoint)
 std::string TakeText(const VTake& i_rTake)
 {
 	const double seconds = double(i_rTake.m_Frames) / i_rTake.m_Rate;
-	std::string text = std::to_string(i_rTake.m_Frames) + " frames at " + SixDigits(i_rTake.m_Rate) + " Hz ("
+	const std::string text = std::to_string(i_rTake.m_Frames) + " frames at " + SixDigits(i_rTake.m_Rate) + " Hz ("
 	    + Fixed(seconds, 2) + " s), " + std::to_string(i_rTake.m_Joints.size()) + " joints, "
 	    + std::to_string(i_rTake.m_Channels) + " channels; in the file " + UpText(i_rTake) + " is up and a unit "
-	    + Fixed(i_rTake.m_FileUnit, 3) + " mm\n";
+	    + Fixed(i_rTake.m_FileUnit, 3) + " mm";
 	VTable table;
 	table.AddColumn("INDEX", VTable::ERight);
 	table.AddColumn("NAME", VTable::ELeft);
@@ -109,14 +111,14 @@ std::string TakeText(const VTake& i_rTake)
 		    std::string(2 * std::min<std::size_t>(depths.back(), 40), ' ') + rJoint.m_Name,
 		    Fixed(rJoint.m_Parent < 0 ? 0.0 : std::hypot(x, y, z), 1), ChannelText(rJoint)});
 	}
-	return text + table.Text(HasColours(STDOUT_FILENO));
+	return FitTerminal(text, 2) + "\n" + table.Text(HasColours(STDOUT_FILENO), TerminalWidth());
 }
 
 EExitStatus ShowTake(const VTakeCommand& i_rCommand)
 {
 	VTake take;
 	std::string error;
-	if (!ReadTake(i_rCommand.m_File, i_rCommand.m_Settings, take, error))
+	if (!ReadTake(InputPath(i_rCommand.m_File, Limits::c_FileBytes).string(), i_rCommand.m_Settings, take, error))
 		throw VCommandError(EBadInput, "\"" + i_rCommand.m_File + "\" could not be read as a take. " + error);
 	RequireNoErrors();
 	PrintResult(TakeToJson(take), TakeText(take));
@@ -132,13 +134,13 @@ VCommand AddTakeCommand(CLI::App& io_rProgram)
 	    "parent and channels, in our axes (Z up). What the file does not tell is guessed from its rest pose, and told",
 	    {"take walk.bvh", "take walk.bvh --unit cm --up z", "take walk.bvh --json | jq .rate"});
 	const auto pCommand = std::make_shared<VTakeCommand>();
-	pApp->add_option("FILE", pCommand->m_File, "Take: BVH file")->required();
+	pApp->add_option("FILE", pCommand->m_File, "Take: BVH file; - is standard input")->required();
 	pApp->add_option_function<std::string>(
 	        "--up",
 	        [pCommand](const std::string& i_rAxis) { pCommand->m_Settings.m_Up = i_rAxis == "y" ? EUp::Y : EUp::Z; },
 	        "The file's axis that points up: y or z; without it the one along which the skeleton reaches further")
 	    ->check(CLI::IsMember({"y", "z"}))
-	    ->type_name("AXIS");
+	    ->option_text("y|z");
 	const auto addNumber = [pApp](const char* i_pName, const char* i_pType, const char* i_pHelp, const auto& i_rParse)
 	{
 		pApp->add_option_function<std::string>(
@@ -149,7 +151,7 @@ VCommand AddTakeCommand(CLI::App& io_rProgram)
 				        throw CLI::ValidationError(i_pName, wrong);
 		        },
 		        i_pHelp)
-		    ->type_name(i_pType);
+		    ->option_text(i_pType);
 	};
 	addNumber("--unit", "UNIT",
 	    "The file's unit: mm, cm, m, inch or a number of millimetres; without it the one that fits the hips",
