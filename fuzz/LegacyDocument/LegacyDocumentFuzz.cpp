@@ -5,13 +5,13 @@
 #include "DebugServices/GlobalLog.h"
 #include "InMemoryHost/PluginContext.h"
 #include "RetargetSetupCore/LegacyText.h"
-#include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
+#include "RetargetSetupDocument/RetargetSetup.h"
 
 namespace
 {
 
-void CheckParallel(const VRetargetSetupCore& i_rDocument)
+void CheckParallel(const VRetargetSetup& i_rDocument)
 {
 	const auto target = i_rDocument.TargetValues();
 	const auto& rSubject = *target.m_pParametrised;
@@ -39,7 +39,7 @@ extern "C" int LLVMFuzzerTestOneInput(const unsigned char* i_pData, std::size_t 
 	RetargetSetup::RepairLegacyRecord(record);
 
 	InMemoryHost::VPluginContext host;
-	VRetargetSetupCore document(host.GetDispatcher(), host.GetFrameFactory(), host.GetItemFactory());
+	VRetargetSetup document(host.GetDispatcher(), host.GetFrameFactory(), host.GetItemFactory());
 	document.SetSourceSubject(record.m_SubjectParametrised, record.m_SubjectApplicationData);
 	document.SetTargetSubject(record.m_SubjectParametrised, record.m_SubjectApplicationData);
 	CheckParallel(document);

@@ -7,6 +7,8 @@
 #include <boost/process/args.hpp>
 #include <boost/process/child.hpp>
 
+#include <sys/wait.h>
+
 namespace CommandLine
 {
 namespace
