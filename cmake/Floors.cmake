@@ -3,7 +3,7 @@
 set(RETARGET_WINGS base model kinematics toolbox formats hostdata scene plugin)
 set(RETARGET_WING_base host math numerics UtilsFileSystem FileSystemWatcher)
 set(RETARGET_WING_model CoreOrlexTypes)
-set(RETARGET_WING_kinematics ComputeSubjectFK)
+set(RETARGET_WING_kinematics ComputeSubjectFK ComputeSubjectSolve)
 set(RETARGET_WING_toolbox CoreOrlexTypesUtils)
 set(RETARGET_WING_formats UtilsRapidXml CoreOrlexQRTIO fbxsdk FBXIO TakeIO)
 set(RETARGET_WING_hostdata TesselDataStore TesselParameters TesselParametersGUI Flow2TypesUtils InMemoryHost)
