@@ -348,7 +348,6 @@ double VCeresPeer::Solve(std::span<const double> i_Positions, std::span<const do
 		rModel.m_States[i] = rModel.m_Before[i];
 	}
 	ceres::Solver::Options options;
-	// Dense ones take longer on this problem.
 	options.linear_solver_type = ceres::SPARSE_NORMAL_CHOLESKY;
 	options.max_num_iterations = 500;
 	options.function_tolerance = i_Tolerance;
