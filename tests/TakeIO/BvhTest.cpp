@@ -190,7 +190,7 @@ TEST(BvhFile, WrittenReadsBackAsItIs)
 TEST(BvhFile, ThatIsDamagedIsRefusedWithTheLine)
 {
 	const std::tuple<std::string, std::string, std::string> rows[]{
-	    {"HIERARCHY", "hello", "It is no BVH file: it does not begin with HIERARCHY"}, {c_Small, "", "It is empty"},
+	    {"HIERARCHY", "hello", "It is neither a BVH file nor an FBX file"}, {c_Small, "", "It is empty"},
 	    {c_Small, "HIERARCHY", "Line 1: It ends before its MOTION"},
 	    {c_Small, "HIERARCHY MOTION", "Line 1: It has no joints"},
 	    {"JOINT Left Leg", "JOINT ", "Line 6: A joint without a name"},

@@ -110,7 +110,7 @@ TEST(Take, ShowsWhatTheFileHolds)
 	    {"no unit", {"take", file, "--unit", "yard"}, 2, "", "\"yard\" is none of mm, cm, m, inch, and no number of"},
 	    {"no axis", {"take", file, "--up", "x"}, 2, "", "x not in {y,z}"},
 	    {"no rate", {"take", file, "--rate", "0"}, 2, "", "\"0\" is no number from 0.001 to 100000"},
-	    {"no take", {"take", Data("motion/README.md")}, 3, "", "could not be read as a take. It is no BVH file"},
+	    {"no take", {"take", Data("motion/README.md")}, 3, "", "could not be read as a take. It is neither a BVH"},
 	    {"missing", {"take", "nothing.bvh"}, 3, "", "\"nothing.bvh\" could not be read as a take."},
 	});
 }

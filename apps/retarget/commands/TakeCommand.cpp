@@ -130,17 +130,23 @@ EExitStatus ShowTake(const VTakeCommand& i_rCommand)
 VCommand AddTakeCommand(CLI::App& io_rProgram)
 {
 	CLI::App* const pApp = AddCommand(io_rProgram, "take",
-	    "Show what recorded motion (BVH) holds: frames and rate, and the joints as a tree with length in mm from the "
-	    "parent and channels, in our axes (Z up). What the file does not tell is guessed from its rest pose, and told",
-	    {"take walk.bvh", "take walk.bvh --unit cm --up z", "take walk.bvh --json | jq .rate"});
+	    "Show what recorded motion (BVH, FBX 7) holds: frames and rate, and the joints as a tree with length in mm "
+	    "from the parent and channels, in our axes (Z up). What the file does not tell is guessed from its rest pose, "
+	    "and told",
+	    {"take walk.bvh", "take walk.bvh --unit cm --up z", "take hero.fbx --stack run --rate 30",
+	        "take walk.bvh --json | jq .rate"});
 	const auto pCommand = std::make_shared<VTakeCommand>();
-	pApp->add_option("FILE", pCommand->m_File, "Take: BVH file; - is standard input")->required();
+	pApp->add_option("FILE", pCommand->m_File, "Take: BVH or FBX file; - is standard input")->required();
 	pApp->add_option_function<std::string>(
 	        "--up",
 	        [pCommand](const std::string& i_rAxis) { pCommand->m_Settings.m_Up = i_rAxis == "y" ? EUp::Y : EUp::Z; },
 	        "The file's axis that points up: y or z; without it the one along which the skeleton reaches further")
 	    ->check(CLI::IsMember({"y", "z"}))
 	    ->option_text("y|z");
+	pApp->add_option_function<std::string>(
+	        "--stack", [pCommand](const std::string& i_rName) { pCommand->m_Settings.m_Stack = i_rName; },
+	        "Of an FBX file the animation stack of this name; without it the first")
+	    ->option_text("STACK");
 	const auto addNumber = [pApp](const char* i_pName, const char* i_pType, const char* i_pHelp, const auto& i_rParse)
 	{
 		pApp->add_option_function<std::string>(

@@ -2,6 +2,7 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "TakeIO/BvhReader.h"
+#include "TakeIO/FbxTakeReader.h"
 #include "TakeIO/Limits.h"
 #include "UtilsFileSystem/Files.h"
 #include "UtilsFileSystem/Paths.h"
@@ -30,18 +31,23 @@ void TellRepeatedNames(const VTake& i_rTake)
 		    example);
 }
 
+bool ReadAny(std::string_view i_Bytes, const VTakeSettings& i_rSettings, VTake& o_rTake, std::string& o_rError)
+{
+	if (IsBvh(i_Bytes))
+		return ReadBvh(i_Bytes, i_rSettings, o_rTake, o_rError);
+	if (IsFbx(i_Bytes))
+		return ReadFbxTake(i_Bytes, i_rSettings, o_rTake, o_rError);
+	o_rError = i_Bytes.empty() ? "It is empty" : "It is neither a BVH file nor an FBX file";
+	return false;
+}
+
 } // namespace
 
 bool TakeIO::ReadTakeFrom(
     std::string_view i_Bytes, const VTakeSettings& i_rSettings, VTake& o_rTake, std::string& o_rError)
 {
 	VTake take;
-	if (!IsBvh(i_Bytes))
-	{
-		o_rError = i_Bytes.empty() ? "It is empty" : "It is no BVH file: it does not begin with HIERARCHY";
-		return false;
-	}
-	if (!ReadBvh(i_Bytes, i_rSettings, take, o_rError))
+	if (!ReadAny(i_Bytes, i_rSettings, take, o_rError))
 		return false;
 	TellRepeatedNames(take);
 	if (i_rSettings.m_Rate && !Resample(take, *i_rSettings.m_Rate))

@@ -17,10 +17,12 @@ struct VTakeSettings
 	std::optional<double> m_Unit;
 	/// Frames a second: the take is resampled. Without it the file's own.
 	std::optional<double> m_Rate;
+	/// The name of an animation stack; without it the first.
+	std::optional<std::string> m_Stack{};
 };
 
-/// Reads a take from a file of any kind that is known; so far BVH. What is guessed, mended or left out is told in the
-/// log category "TakeIO".
+/// Reads a take from a file of any kind that is known; BVH, and FBX of version 7. What is guessed, mended or left out
+/// is told in the log category "TakeIO".
 /// @return false if it cannot be read; then o_rTake is as it was, and o_rError tells why, with the line.
 bool ReadTake(const std::string& i_rPath, const VTakeSettings& i_rSettings, VTake& o_rTake, std::string& o_rError);
 

@@ -1,0 +1,203 @@
+#include "../UtilsFileSystem/Log.h"
+#include "../fbxsdk/FbxFileBuilder.h"
+
+#include "TakeIO/FbxCurve.h"
+#include "TakeIO/ReadTake.h"
+#include "fbxsdk/container/FileKind.h"
+
+#include <gtest/gtest.h>
+
+#include <bit>
+
+using namespace FbxTest;
+using namespace TakeIO;
+
+namespace
+{
+
+constexpr double c_Second = 46186158000.0;
+
+struct VCurveRow
+{
+	const char* m_pName;
+	VIntegers m_Flags;
+	/// Four for each key.
+	VNumbers m_Data;
+	/// Second and value.
+	std::vector<std::pair<double, double>> m_Values;
+};
+
+void PrintTo(const VCurveRow& i_rRow, std::ostream* o_pStream)
+{
+	*o_pStream << i_rRow.m_pName;
+}
+
+/// Keys of 0, 6, 8 and 8 at 0, 1, 3 and 4 seconds: the secants are 6, 1 and 0.
+VTestRecord CurveRecord(std::int64_t i_Id, const VIntegers& i_rFlags, const VNumbers& i_rData)
+{
+	return Record("AnimationCurve", {i_Id, std::string("AnimCurve::"), std::string()},
+	    {Record("KeyTime", {VNumbers{0, c_Second, 3 * c_Second, 4 * c_Second}}),
+	        Record("KeyValueFloat", {VNumbers{0, 6, 8, 8}}), Record("KeyAttrFlags", {i_rFlags}),
+	        Record("KeyAttrDataFloat", {i_rData}),
+	        Record("KeyAttrRefCount", {VIntegers(i_rFlags.size(), std::int32_t(4 / i_rFlags.size()))})});
+}
+
+class FbxCurve : public testing::TestWithParam<VCurveRow>
+{
+};
+
+TEST_P(FbxCurve, HasTheValuesComputedByHand)
+{
+	for (const VTestForm& rForm : {c_Forms[1], c_Forms[4]})
+	{
+		const std::string bytes = Write(rForm, {CurveRecord(1, GetParam().m_Flags, GetParam().m_Data)});
+		FbxFormat::VElementTree tree;
+		ASSERT_TRUE(tree.Read(bytes, FbxFormat::DetectFileKind(bytes)));
+		FbxFormat::VDecodeBudget budget;
+		VFbxCurve curve;
+		ASSERT_TRUE(curve.Read(tree, tree.Find(0, "AnimationCurve"), budget));
+		for (const auto& [second, value] : GetParam().m_Values)
+			EXPECT_NEAR(curve.At(second * c_Second), value, 1e-6) << rForm.m_pName << " at " << second;
+	}
+}
+
+// A cubic way in its middle is (a + b) / 2 + (m - n) w / 8, with m and n the slopes at its ends and w the seconds.
+INSTANTIATE_TEST_SUITE_P(Rows, FbxCurve,
+    testing::Values(VCurveRow{"Constant", {0x2}, VNumbers(4), {{-1, 0}, {0, 0}, {0.9, 0}, {1, 6}, {2.9, 6}, {9, 8}}},
+        VCurveRow{"ConstantNext", {0x102}, VNumbers(4), {{0.1, 6}, {1, 8}, {2, 8}}},
+        VCurveRow{"Linear", {0x4}, VNumbers(4), {{-5, 0}, {0.5, 3}, {1, 6}, {2, 7}, {3.5, 8}, {5, 8}}},
+        // Slopes 3 and 1: 3 + 2 / 8.
+        VCurveRow{"User", {0x408, 0x408, 0x408, 0x408}, {3, 1, 0, 0, 2, -1, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0},
+            {{0.5, 3.25}, {1, 6}, {2, 7.75}, {3.5, 8}}},
+        // 8 / 3 and 2 / 3 at the keys within: 3 + (6 - 8/3) / 8, 7 + (8/3 - 2/3) 2 / 8.
+        VCurveRow{"Auto", {0x108}, VNumbers(4), {{0.5, 3.4166666667}, {2, 7.5}}},
+        // Of the parabola: (6 * 2 + 1 * 1) / 3 = 13/3, and (1 * 1 + 0 * 2) / 3 = 1/3.
+        VCurveRow{"TimeIndependent", {0x2108}, VNumbers(4), {{0.5, 3.2083333333}, {2, 8}}},
+        // 0 at both ends; 13/3 becomes 3 times the lesser secant, 1/3 becomes 0 beside a way that stands still.
+        VCurveRow{"Progressive", {0x6108}, VNumbers(4), {{0.5, 2.625}, {2, 7.75}, {3.5, 8}}},
+        VCurveRow{"Clamp", {0x1108}, VNumbers(4), {{2, 7.6666666667}, {3.5, 8}}},
+        // Without tension, continuity and bias half the sum of the secants: 3.5 and 0.5; with tension 1 all are 0.
+        VCurveRow{"Tcb", {0x208}, VNumbers(4), {{0.5, 3.3125}, {2, 7.75}}},
+        VCurveRow{"TcbTense", {0x208}, {1, 0, 0, 0}, {{0.5, 3}, {2, 7}}},
+        // Continuity 0.5: out of the second key 0.75 * 6 + 0.25 * 1 = 4.75, into the third 0.25 * 1 + 0.75 * 0.
+        VCurveRow{"TcbBroken", {0x208}, {0, 0.5, 0, 0}, {{2, 8.125}}}),
+    [](const auto& i_rInfo) { return std::string(i_rInfo.param.m_pName); });
+
+/// Weights of 1 are 9999, two in one number; as text its bits are printed as a whole number.
+TEST(FbxCurve, WeightedSlopesBendTime)
+{
+	const std::uint32_t weights = 0x270F0000u >> 16 | 0x270F0000u;
+	for (const bool bText : {false, true})
+	{
+		const double packed = bText ? double(weights) : double(std::bit_cast<float>(weights));
+		const std::string bytes = Write(c_Forms[bText ? 4 : 1], {CurveRecord(1, {0x03000408}, {2, 2, packed, 0})});
+		FbxFormat::VElementTree tree;
+		ASSERT_TRUE(tree.Read(bytes, FbxFormat::DetectFileKind(bytes)));
+		FbxFormat::VDecodeBudget budget;
+		VFbxCurve curve;
+		ASSERT_TRUE(curve.Read(tree, tree.Find(0, "AnimationCurve"), budget));
+		// Here time all but stands still.
+		EXPECT_NEAR(curve.At(0.5 * c_Second), 3.0, 1e-4);
+		// Weights of 1: time is 3 s (1 - s)^2 + s^3, the value 0 + 6 s (1-s)^2 + 12 s^2 (1-s) + 6 s^3 at s = 0.25 is
+		// 0.4375 seconds and 0.84375 + 0.5625 + 0.09375.
+		EXPECT_NEAR(curve.At(0.4375 * c_Second), 1.5, 1e-9);
+	}
+}
+
+/// Hips and a knee below, at scale 2 with Y up and centimetres; the hips walk along x, the knee turns about z.
+std::string TakeFile(const VTestForm& i_rForm, const std::string& i_rLocalStop = {})
+{
+	VTestScene scene{{{"hips", "LimbNode", -1, {{"Lcl Translation", {0, 90, 0}}, {"Lcl Scaling", {2, 2, 2}}}},
+	                     {"knee", "LimbNode", 0, {{"Lcl Translation", {0, -20, 0}}}}, {"mesh", "Mesh", -1, {}}},
+	    {{"UpAxis", {1}}, {"UnitScaleFactor", {1}}, {"TimeMode", {10}}}, {}, {}};
+	std::vector<VTestRecord> records = Records(i_rForm, scene);
+	VTestRecord& rObjects = records[records.size() - 2];
+	VTestRecord& rConnections = records.back();
+	const auto object = [&](const char* i_pKind, std::int64_t i_Id, const char* i_pName,
+	                        std::vector<VTestRecord> i_Children) {
+		rObjects.m_Children.push_back(
+		    Record(i_pKind, {i_Id, std::string(i_pName), std::string()}, std::move(i_Children)));
+	};
+	const auto connect = [&](std::int64_t i_Child, std::int64_t i_Parent, const std::string& i_rProperty)
+	{
+		VTestRecord& rRecord = rConnections.m_Children.emplace_back(
+		    Record("C", {std::string(i_rProperty.empty() ? "OO" : "OP"), i_Child, i_Parent}));
+		if (!i_rProperty.empty())
+			rRecord.m_Values.push_back(i_rProperty);
+	};
+	std::vector<VTestRecord> span;
+	if (!i_rLocalStop.empty())
+		span.push_back(PropertyList(7400, {{"LocalStop", {std::stod(i_rLocalStop)}}}));
+	object("AnimationStack", 100, "AnimStack::walk", span);
+	object("AnimationStack", 101, "AnimStack::other", {});
+	object("AnimationLayer", 102, "AnimLayer::base", {});
+	object("AnimationCurveNode", 103, "AnimCurveNode::T",
+	    {PropertyList(7400, {{"d|X", {7}}, {"d|Y", {80}}, {"d|Z", {0}}})});
+	object("AnimationCurveNode", 104, "AnimCurveNode::R", {PropertyList(7400, {{"d|Z", {0}}})});
+	rObjects.m_Children.push_back(CurveRecord(105, {0x4}, VNumbers(4)));
+	for (const auto& [child, parent, property] : {std::tuple(102, 100, ""), {103, 102, ""}, {104, 102, ""},
+	         {103, 1, "Lcl Translation"}, {104, 2, "Lcl Rotation"}, {105, 103, "d|X"}, {105, 104, "d|Z"}})
+		connect(child, parent, property);
+	return Write(i_rForm, records);
+}
+
+TEST(FbxTake, PlacesJointsInOurAxes)
+{
+	for (const VTestForm& rForm : {c_Forms[1], c_Forms[2], c_Forms[4]})
+	{
+		SCOPED_TRACE(rForm.m_pName);
+		VTestLog log("TakeIO");
+		VTake take;
+		std::string error;
+		ASSERT_TRUE(ReadTakeFrom(TakeFile(rForm), {}, take, error)) << error;
+		EXPECT_EQ(
+		    log.Take(), std::vector<std::string>{"3 Of its 2 stacks the first is read, \"walk\". It has: walk, other"});
+		ASSERT_EQ(take.m_Joints.size(), 2u) << "no mesh";
+		EXPECT_EQ(take.m_Rate, 25.0);
+		ASSERT_EQ(take.m_Frames, 101u);
+		std::vector<VJointPose> poses;
+		WorldRestPoses(take, poses);
+		const auto expect = [&](std::size_t i_Joint, const Rotation::VVector3& i_rPlace)
+		{
+			for (std::size_t i = 0; i < 3; ++i)
+				EXPECT_NEAR(poses[i_Joint].t[i], i_rPlace[i], 1e-9) << i_Joint;
+		};
+		expect(0, {0, 0, 900});
+		expect(1, {0, 0, 500});
+		// Half a second: 3 units along x; y stands at the curve node's own 80. The knee turns by 3 degrees about the
+		// file's z, which is our -y.
+		ASSERT_TRUE(ReadTakeFrom(TakeFile(rForm), {{}, {}, 4.0, "walk"}, take, error)) << error;
+		ASSERT_EQ(take.m_Frames, 17u);
+		WorldPoses(take, 2, poses);
+		expect(0, {30, 0, 800});
+		expect(1, {30, 0, 400});
+		const Rotation::VVector3 turn = Rotation::AngleAxisFromRotationMatrix(poses[1].R);
+		EXPECT_NEAR(turn[1], -3.0 * 3.14159265358979 / 180.0, 1e-12);
+	}
+}
+
+TEST(FbxTake, ThatCannotBeReadIsRefused)
+{
+	std::string damaged = TakeFile(c_Forms[4]);
+	damaged.replace(damaged.find("KeyValueFloat: *4"), 17, "KeyValueFloat: *3");
+	const std::tuple<std::string, VTakeSettings, std::string> rows[]{
+	    {TakeFile(c_Forms[1]), {{}, {}, {}, "run"}, "It has no such stack. It has: walk, other"},
+	    {TakeFile(c_Forms[1]), {{}, {}, {}, "other"}, "Nothing moves in its stack \"other\""},
+	    {TakeFile(c_Forms[1], "1e18"), {}, "Its stack \"walk\" lasts longer than such a file is read"},
+	    {Write(c_Forms[0], VTestScene{}), {}, "Takes are read from FBX files of version 7"},
+	    {Write(c_Forms[1], VTestScene{}), {}, "It has no joints"},
+	    {damaged, {}, "A curve of its stack \"walk\" is damaged or too large"},
+	    {TakeFile(c_Forms[1]).substr(0, 900), {},
+	        "The FBX file is damaged: a record reaches beyond what holds it (byte"}};
+	for (const auto& [bytes, settings, message] : rows)
+	{
+		VTestLog log("TakeIO");
+		VTake take;
+		std::string error;
+		EXPECT_FALSE(ReadTakeFrom(bytes, settings, take, error)) << message;
+		EXPECT_EQ(error.substr(0, message.size()), message);
+		EXPECT_TRUE(take.m_Joints.empty());
+	}
+}
+
+} // namespace
