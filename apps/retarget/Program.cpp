@@ -124,7 +124,7 @@ VProgram MakeProgram(const VRender& i_rRender)
 	rApp.allow_extras();
 	const auto addRender = [&](CLI::App& io_rProgram) { return AddRenderCommand(io_rProgram, i_rRender); };
 	using VAdd = std::function<VCommand(CLI::App&)>;
-	for (const VAdd& rAdd : {VAdd(AddCreateCommand), VAdd(AddEditCommand), VAdd(AddTargetsCommand),
+	for (const VAdd& rAdd : {VAdd(AddCreateCommand), VAdd(AddEditCommand), VAdd(AddMapCommand), VAdd(AddTargetsCommand),
 	         VAdd(AddCheckCommand), VAdd(AddBonesCommand), VAdd(AddSegmentsCommand), VAdd(addRender),
 	         VAdd(AddFbxCommand), VAdd(AddTakeCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand),
 	         VAdd(AddConvertCommand), VAdd(AddSchemaCommand), VAdd(AddEvalCommand), VAdd(AddDocumentationCommand)})

@@ -7,7 +7,7 @@
 #include "retarget/text/Output.h"
 #include "retarget/text/Table.h"
 
-#include "RetargetSetupCore/SideOfName.h"
+#include "SetupProposal/Side.h"
 
 #include <gtest/gtest.h>
 
@@ -116,12 +116,13 @@ TEST(Messages, AllWarningsAreExplained)
 
 TEST(Side, StandsInAWordOfItsOwn)
 {
-	using enum RetargetSetup::ESide;
+	using enum SetupProposal::ESide;
 	for (const auto& [pName, side] : {std::pair{"LeftArm", Left}, {"upperArmRight", Right}, {"RThumb", Right},
 	         {"lThigh", Left}, {"thumb_01_l", Left}, {"Bip01 L UpperArm", Left}, {"Character1_RightArm", Right},
 	         {"Lefthand", Left}, {"RIGHT_ARM", Right}, {"toe.R.001", Right}, {"Left:Spine", None}, {"Spine", None},
-	         {"collar", None}, {"bright", None}, {"LR", None}, {"LeftRightMid", None}, {"", None}})
-		EXPECT_EQ(RetargetSetup::SideOfName(pName), side) << pName;
+	         {"collar", None}, {"bright", None}, {"LR", None}, {"LeftRightMid", None}, {"", None},
+	         {"bras_gauche", Left}, {"Hand_rechts", Right}, {"右腕", Right}})
+		EXPECT_EQ(SetupProposal::SideOfName(pName), side) << pName;
 }
 
 TEST(Elements, FindsByNameAndIndex)

@@ -15,6 +15,7 @@ VCommand AddTakeCommand(CLI::App& io_rProgram);
 VCommand AddDumpCommand(CLI::App& io_rProgram);
 VCommand AddConvertCommand(CLI::App& io_rProgram);
 VCommand AddFkCommand(CLI::App& io_rProgram);
+VCommand AddMapCommand(CLI::App& io_rProgram);
 VCommand AddTargetsCommand(CLI::App& io_rProgram);
 VCommand AddCheckCommand(CLI::App& io_rProgram);
 VCommand AddCreateCommand(CLI::App& io_rProgram);

@@ -30,7 +30,7 @@ EExitStatus Create(const VCreateSettings& i_rSettings, const VEdits& i_rEdits)
 	// The target subject takes the source's name when it is made.
 	if (!i_rSettings.m_Source.empty())
 		session.LoadSource(i_rSettings.m_Source);
-	session.CreateTarget(i_rSettings.m_Fbx, i_rSettings.m_Root);
+	session.CreateTarget(i_rSettings.m_Fbx, i_rSettings.m_Root, TakesProposal(i_rEdits));
 	if (const auto worst = session.Document().DifferenceFromFile())
 		NVX_LOG(c_pCategory, NVX::ELogWarning,
 		    "The bind pose as built differs from the pose in the file, %1%; --match-file-pose mends it",

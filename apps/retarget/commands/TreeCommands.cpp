@@ -10,7 +10,7 @@
 #include "CoreOrlexTypes/Fields.h"
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "FBXIO/FBXReader.h"
-#include "RetargetSetupCore/SideOfName.h"
+#include "SetupProposal/Side.h"
 
 #include <algorithm>
 #include <cmath>
@@ -39,11 +39,11 @@ using VTree = std::vector<VTreeNode>;
 
 const char* SideText(const std::string& i_rName)
 {
-	switch (RetargetSetup::SideOfName(i_rName))
+	switch (SetupProposal::SideOfName(i_rName))
 	{
-	case RetargetSetup::ESide::Left: return "left";
-	case RetargetSetup::ESide::Right: return "right";
-	case RetargetSetup::ESide::None: break;
+	case SetupProposal::ESide::Left: return "left";
+	case SetupProposal::ESide::Right: return "right";
+	case SetupProposal::ESide::None: break;
 	}
 	return "";
 }

@@ -3,19 +3,23 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Suggest.h"
+#include "retarget/subject/Mapping.h"
 #include "retarget/text/InputFile.h"
 
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
+#include "RetargetSetupCore/Partner.h"
 #include "RetargetSetupCore/RetargetTargets.h"
-#include "RetargetSetupCore/SideOfName.h"
+#include "RetargetSetupCore/RootHeight.h"
+#include "SetupProposal/Side.h"
 #include "UtilsFileSystem/Files.h"
 #include "math/NumberText.h"
 
 #include <algorithm>
 #include <iterator>
+#include <numbers>
 #include <sstream>
 
 namespace CommandLine
@@ -27,12 +31,12 @@ using CoreOrlexTypes::VSubjectParametrised;
 
 /// The index of the segment on the other side, -1 if there is none.
 std::int32_t PartnerOf(
-    const VSession::VPartners& i_rPartners, const VSubjectParametrised& i_rSubject, std::size_t i_Segment)
+    const VSession::VPartners& i_rPartners, const VRetargetSetupCore::VSubjectValues& i_rValues, std::size_t i_Segment)
 {
 	for (auto it = i_rPartners.rbegin(); it != i_rPartners.rend(); ++it)
 		if (it->first == i_Segment || it->second == i_Segment)
 			return std::int32_t(it->first == i_Segment ? it->second : it->first);
-	return RetargetSetup::FindMirrorSegment(i_rSubject, i_Segment);
+	return RetargetSetup::FindPartner(*i_rValues.m_pParametrised, *i_rValues.m_pSubject, i_Segment);
 }
 
 void AddOneTarget(
@@ -56,12 +60,14 @@ void AddTarget(VSession& io_rSession, const std::string& i_rPair, bool i_bPositi
 		return;
 	const std::string& rSourceName = rSource.m_Segments[source].m_Name;
 	const std::string& rTargetName = io_rSession.Target().m_Segments[target].m_Name;
-	const std::int32_t sourcePartner = PartnerOf(io_rSession.m_SourcePartners, rSource, source);
-	const std::int32_t targetPartner = PartnerOf(io_rSession.m_TargetPartners, io_rSession.Target(), target);
+	const std::int32_t sourcePartner =
+	    PartnerOf(io_rSession.m_SourcePartners, io_rSession.Document().SourceValues(), source);
+	const std::int32_t targetPartner =
+	    PartnerOf(io_rSession.m_TargetPartners, io_rSession.Document().TargetValues(), target);
 	if (sourcePartner != -1 && targetPartner != -1)
 		return AddOneTarget(io_rSession, edit, std::size_t(sourcePartner), std::size_t(targetPartner), i_bPosition);
 	const auto hasSide = [](const std::string& i_rName)
-	{ return RetargetSetup::SideOfName(i_rName) != RetargetSetup::ESide::None; };
+	{ return SetupProposal::SideOfName(i_rName) != SetupProposal::ESide::None; };
 	const std::string sentence = edit + ": " + (sourcePartner == -1 ? "the source segment \"" + rSourceName + "\"" : "")
 	    + (sourcePartner == -1 && targetPartner == -1 ? " and " : "")
 	    + (targetPartner == -1 ? "the target segment \"" + rTargetName + "\"" : "")
@@ -129,6 +135,16 @@ void Pair(VSession& io_rSession, const std::string& i_rPair)
 void AllowPartial(VSession& io_rSession, const std::string&)
 {
 	io_rSession.m_bAllowPartial = true;
+}
+
+void Auto(VSession& io_rSession, const std::string&)
+{
+	AddProposedTargets(io_rSession);
+}
+
+void MinimumScore(VSession& io_rSession, const std::string& i_rScore)
+{
+	io_rSession.m_MinimumScore = ParseScore(i_rScore);
 }
 
 void RemoveTarget(VSession& io_rSession, const std::string& i_rIndex)
@@ -223,6 +239,30 @@ void ForgetPoseWarnings()
 	    });
 }
 
+void MoveRoot(VSession& io_rSession, const char* i_pEdit, const std::function<void(Rotation::VPose<double>&)>& i_rMove)
+{
+	VSubjectParametrised subject = io_rSession.Target();
+	if (!RetargetSetup::MoveRoot(subject, i_rMove))
+		throw VCommandError(
+		    EBadInput, std::string(i_pEdit) + ": the root of the target subject has no place that could change");
+	io_rSession.Document().SetTargetSubjectParametrised(subject);
+}
+
+void Turn(VSession& io_rSession, const std::string& i_rDegrees)
+{
+	const double angle = ParseFinite(i_rDegrees, "--turn") * std::numbers::pi / 180.0;
+	MoveRoot(io_rSession, "--turn",
+	    [&](Rotation::VPose<double>& io_rWorld) {
+		    io_rWorld.R = Rotation::Product(Rotation::RotationMatrixFromAngleAxis({0.0, 0.0, angle}), io_rWorld.R);
+	    });
+}
+
+void Lift(VSession& io_rSession, const std::string& i_rMm)
+{
+	const double mm = ParseFinite(i_rMm, "--lift");
+	MoveRoot(io_rSession, "--lift", [&](Rotation::VPose<double>& io_rWorld) { io_rWorld.t[2] += mm; });
+}
+
 void MatchFilePose(VSession& io_rSession, const std::string&)
 {
 	io_rSession.Document().MatchFilePose();
@@ -256,6 +296,12 @@ constexpr VEditKind c_Kinds[] = {
         "Let a target of one side, wherever it stands, go without a partner where none is found; without this it is an "
         "error (exit status 1)",
         AllowPartial},
+    {"--auto", nullptr,
+        "Add targets for all pairs of segments that \"retarget map\" proposes, with the kinds and weights that it "
+        "suggests; a pair that has such a target keeps it",
+        Auto},
+    {"--min-score", "SCORE", "From here on, --auto takes no pair that scores less: from 0 to 1, at first 0.5",
+        MinimumScore},
     {"--remove-target", "N", "Remove target N; those behind it move up by one", RemoveTarget},
     {"--weight", "N=W", "Give target N the weight W", SetWeight},
     {"--state", "N=X,Y,Z",
@@ -267,6 +313,10 @@ constexpr VEditKind c_Kinds[] = {
     {"--pose", "SEG=RX,RY,RZ[,TX,TY,TZ]",
         "Set the bind pose of the target segment SEG: an angle-axis in radians, for the root a translation in mm too",
         Pose},
+    {"--turn", "DEGREES",
+        "Turn the target subject in its bind pose about the vertical through its root, to the left as seen from above",
+        Turn},
+    {"--lift", "MM", "Lift the root of the target subject in its bind pose; negative lowers it", Lift},
     {"--match-file-pose", nullptr,
         "Set all bind poses so that the segments stand as the bones do in the FBX file; belongs after --prune-joints",
         MatchFilePose, true},
@@ -368,6 +418,11 @@ void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits,
 	    ->option_text("FILE")
 	    ->trigger_on_parse()
 	    ->group(c_pEditsGroup);
+}
+
+bool TakesProposal(const VEdits& i_rEdits)
+{
+	return std::ranges::any_of(i_rEdits, [](const VEdit& i_rEdit) { return i_rEdit.m_pKind->m_pApply == Auto; });
 }
 
 void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord)

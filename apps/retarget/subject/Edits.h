@@ -37,6 +37,9 @@ using VEdits = std::vector<VEdit>;
 /// Adds the options of all edits to a command; parsing appends to the list.
 void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits, bool i_bOfCreate);
 
+/// Whether one of them adds what is proposed, which needs a source, and the root that the body hangs on.
+bool TakesProposal(const VEdits& i_rEdits);
+
 /// "--root-height", which is no edit: it counts for all of them.
 /// @param o_rWord must outlive the parsing.
 void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord);

@@ -2,6 +2,7 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
+#include "retarget/subject/Mapping.h"
 #include "retarget/subject/SubjectFile.h"
 #include "retarget/text/InputFile.h"
 #include "retarget/text/Output.h"
@@ -80,7 +81,7 @@ void VSession::LoadTarget(const std::string& i_rPath)
 	Settle();
 }
 
-void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot)
+void VSession::LoadFbx(const std::string& i_rPath)
 {
 	if (!m_pDocument->LoadTargetFBX(InputPath(i_rPath)))
 		throw VCommandError(EBadInput,
@@ -91,8 +92,19 @@ void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std:
 		throw VCommandError(EBadInput,
 		    "\"" + i_rPath + "\" could be read only in part: " + std::to_string(pSkeleton->size())
 		        + " bones up to where it broke off");
+}
+
+void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot, bool i_bBodyRoot)
+{
+	LoadFbx(i_rPath);
+	const auto pSkeleton = m_pDocument->GetFBXSkeleton();
+	m_Root = 0;
 	if (i_rRoot)
-		m_pDocument->SetTargetRootIndex(std::uint32_t(FindRoot(*i_rRoot, *pSkeleton)));
+		m_Root = FindRoot(*i_rRoot, *pSkeleton);
+	else if (const std::int64_t root = i_bBodyRoot ? ProposeForFile(*this).m_Root : -1; root >= 0)
+		m_Root = std::size_t(root);
+	if (i_rRoot || *m_Root != 0)
+		m_pDocument->SetTargetRootIndex(std::uint32_t(*m_Root));
 	m_bTargetNamed = i_rPath != c_pStandardStream;
 	m_pDocument->CreateTargetSubject();
 	Settle();

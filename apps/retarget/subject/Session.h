@@ -5,6 +5,7 @@
 #include "InMemoryHost/Application.h"
 #include "InMemoryHost/Dispatcher.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
+#include "SetupProposal/Proposal.h"
 #include "numerics/Rotation.h"
 
 #include <memory>
@@ -26,9 +27,12 @@ public:
 	void LoadSource(const std::string& i_rPath);
 	void LoadTarget(const std::string& i_rPath);
 
+	/// Reads the FBX file, whole or with EBadInput.
+	void LoadFbx(const std::string& i_rPath);
 	/// Reads the FBX file and makes the target subject of it, from the root bone of this name or index on; without one
 	/// the choice is the document's. EWrongUsage for a root that the file does not have.
-	void CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot);
+	/// @param i_bBodyRoot without a name, the root bone that most of the body hangs on, which needs a source.
+	void CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot, bool i_bBodyRoot = false);
 
 	/// EBadOutput if the file could not be written; the one that stood there then stays. "-" is standard output.
 	/// EFindings with --strict, and nothing written, if there has been a warning or saving would bring one.
@@ -63,6 +67,10 @@ public:
 	/// One sentence for each target of a side that should have got a partner and did not.
 	std::vector<std::string> m_WithoutPartner;
 	bool m_bAllowPartial = false;
+	/// Of pairs that are proposed.
+	double m_MinimumScore = SetupProposal::c_DefaultLeastScore;
+	/// The bone that the target subject was made from; nothing for one that was loaded.
+	std::optional<std::size_t> m_Root;
 	/// The bind poses have been taken from the file.
 	bool m_bMatched = false;
 

@@ -15,6 +15,7 @@ TesselPluginInterface::VHostRules VApplicationObject::Rules() const
 	TesselPluginInterface::VHostRules rules;
 	rules.m_bNamespacesAreDetails = true;
 	rules.m_bEachPairOnce = true;
+	rules.m_bPartnersBySides = true;
 	rules.m_bPoseFromFile = m_pPreferences->Number(c_pPoseFromFileKey, 1) != 0;
 	rules.m_bMirrorChange = true;
 	return rules;

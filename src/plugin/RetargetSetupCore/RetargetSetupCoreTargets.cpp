@@ -7,6 +7,7 @@
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/Joints.h"
+#include "RetargetSetupCore/Partner.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 
@@ -115,8 +116,14 @@ void VRetargetSetupCore::AddTarget(
 	addPair(sourceIndex, targetIndex);
 	if (i_bSymmetry)
 	{
-		const std::int32_t sourceMirror = RetargetSetup::FindMirrorSegment(*source.m_pParametrised, sourceIndex);
-		const std::int32_t targetMirror = RetargetSetup::FindMirrorSegment(subject, targetIndex);
+		const bool bBySides = HostRules().m_bPartnersBySides;
+		const auto partner = [&](const VSubjectValues& i_rValues, std::size_t i_Index)
+		{
+			return bBySides ? RetargetSetup::FindPartner(*i_rValues.m_pParametrised, *i_rValues.m_pSubject, i_Index)
+			                : RetargetSetup::FindMirrorSegment(*i_rValues.m_pParametrised, i_Index);
+		};
+		const std::int32_t sourceMirror = partner(source, sourceIndex);
+		const std::int32_t targetMirror = partner(target, targetIndex);
 		if (sourceMirror == -1)
 			TellNoPartner(*source.m_pParametrised, sourceIndex, "source");
 		if (targetMirror == -1)

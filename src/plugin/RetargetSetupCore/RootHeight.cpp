@@ -38,23 +38,35 @@ const char* Side(double i_Height)
 
 } // namespace
 
-void ScaleRootHeight(VSubjectParametrised& io_rSubject, double i_Factor)
+bool MoveRoot(VSubjectParametrised& io_rSubject, const std::function<void(Rotation::VPose<double>&)>& i_rMove)
 {
 	if (io_rSubject.m_Segments.empty())
-		return;
+		return false;
 	VSubjectParametrised::VJoint& rJoint = io_rSubject.m_Segments.front().m_Joint;
 	std::vector<double>& rBindPose = rJoint.m_BindPose;
-	if (rBindPose.size() < c_RootLength)
-		return;
+	if (rBindPose.size() < c_RootLength || rJoint.m_JointOrientation != std::array<double, 3>{})
+		return false;
 	// The joint moves in the frame of its segment.
 	const VSubject subject = Converted(io_rSubject);
 	const VSubject::VSegment& rRoot = subject.m_Segments.front();
 	const Rotation::VPose<double> pre = Rotation::PoseFromAngleAxis(rRoot.m_PreRotation, rRoot.m_PreTranslation);
-	Rotation::VPose<double> world;
-	world.t = Rotation::Apply(pre, {rBindPose[3], rBindPose[4], rBindPose[5]});
-	world.t[2] *= i_Factor;
-	std::ranges::copy(Rotation::Relative(pre, world).t, rBindPose.begin() + 3);
+	const Rotation::VPose<double> before = Rotation::Compose(pre,
+	    Rotation::PoseFromAngleAxis(
+	        {rBindPose[0], rBindPose[1], rBindPose[2]}, {rBindPose[3], rBindPose[4], rBindPose[5]}));
+	Rotation::VPose<double> world = before;
+	i_rMove(world);
+	const Rotation::VPose<double> joint = Rotation::Relative(pre, world);
+	// What does not turn keeps its angles to the bit.
+	if (world.R != before.R)
+		std::ranges::copy(Rotation::AngleAxisFromRotationMatrix(joint.R), rBindPose.begin());
+	std::ranges::copy(joint.t, rBindPose.begin() + 3);
 	rJoint.m_Mean = rBindPose;
+	return true;
+}
+
+void ScaleRootHeight(VSubjectParametrised& io_rSubject, double i_Factor)
+{
+	MoveRoot(io_rSubject, [&](Rotation::VPose<double>& io_rWorld) { io_rWorld.t[2] *= i_Factor; });
 }
 
 std::optional<VLowestSegment> FindLowestSegment(const VSubjectParametrised& i_rSubject)

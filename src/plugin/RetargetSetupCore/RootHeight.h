@@ -1,14 +1,21 @@
 #pragma once
 
 #include "CoreOrlexTypes/SubjectParametrised.h"
+#include "numerics/Rotation.h"
 
 #include <cstddef>
+#include <functional>
 #include <optional>
 
 /// Where a target subject stands above the floor, which is the plane of height 0. The scale reaches every length, but
 /// not the place of the root.
 namespace RetargetSetup
 {
+
+/// Changes where the root stands in the world, in its bind pose and its mean. False, with no change, for a root that
+/// has no place, or whose joint has an orientation of its own.
+bool MoveRoot(CoreOrlexTypes::VSubjectParametrised& io_rSubject,
+    const std::function<void(Rotation::VPose<double>& io_rWorld)>& i_rMove);
 
 /// Multiplies the height of the root above the floor by a factor, in its bind pose and its mean. Does nothing to a root
 /// that has no place.

@@ -22,6 +22,9 @@ struct VHostRules
 	bool m_bNamespacesAreDetails = false;
 	/// A pair of segments that has a target of a kind gets no second one of that kind.
 	bool m_bEachPairOnce = false;
+	/// A segment whose name differs from its partner's in more than the rule for names knows finds it by words for
+	/// sides anywhere in the names, or by its place.
+	bool m_bPartnersBySides = false;
 };
 
 /// What a host may give beyond the services that every host gives: the application object of such a host implements

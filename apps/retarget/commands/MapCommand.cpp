@@ -1,0 +1,194 @@
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/commands/Commands.h"
+#include "retarget/subject/Mapping.h"
+#include "retarget/subject/Session.h"
+#include "retarget/text/Output.h"
+#include "retarget/text/Table.h"
+
+#include "SetupProposal/PoseCheck.h"
+
+#include <cmath>
+#include <unistd.h>
+
+namespace CommandLine
+{
+namespace
+{
+
+using SetupProposal::VProposedPair;
+using SetupProposal::VRestSkeleton;
+
+struct VMapSettings
+{
+	std::string m_Source;
+	std::string m_Fbx;
+	std::string m_Subject;
+	std::string m_MinimumScore;
+};
+
+VJson ToJson(const VProposedPair& i_rPair, const VMapped& i_rMapped)
+{
+	VJson item{{"source", i_rMapped.m_Source[i_rPair.m_Source].m_Name},
+	    {"target", i_rMapped.m_Target[i_rPair.m_Target].m_Name}, {"score", std::round(1e4 * i_rPair.m_Score) / 1e4},
+	    {"reasons", i_rPair.m_Reasons}};
+	if (i_rPair.m_PositionWeight > 0.0)
+		item["position"] = i_rPair.m_PositionWeight;
+	if (i_rPair.m_RotationWeight > 0.0)
+		item["rotation"] = i_rPair.m_RotationWeight;
+	return item;
+}
+
+VJson ToJson(const std::vector<VProposedPair>& i_rPairs, const VMapped& i_rMapped)
+{
+	VJson list = VJson::array();
+	for (const VProposedPair& rPair : i_rPairs)
+		list.push_back(ToJson(rPair, i_rMapped));
+	return list;
+}
+
+VJson ToJson(const std::vector<SetupProposal::VUnmapped>& i_rUnmapped, const VRestSkeleton& i_rSkeleton)
+{
+	VJson list = VJson::array();
+	for (const auto& rUnmapped : i_rUnmapped)
+		list.push_back({{"name", i_rSkeleton[rUnmapped.m_Joint].m_Name}, {"reason", rUnmapped.m_Reason}});
+	return list;
+}
+
+VJson ToJson(const VMapped& i_rMapped)
+{
+	const SetupProposal::VProposal& rProposal = i_rMapped.m_Proposal;
+	VJson json{{"pairs", ToJson(rProposal.m_Pairs, i_rMapped)},
+	    {"alternatives", ToJson(rProposal.m_Alternatives, i_rMapped)},
+	    {"unmapped",
+	        {{"source", ToJson(rProposal.m_UnmappedSources, i_rMapped.m_Source)},
+	            {"target", ToJson(rProposal.m_UnmappedTargets, i_rMapped.m_Target)}}}};
+	if (i_rMapped.m_Root >= 0)
+		json["root"] = i_rMapped.m_Target[std::size_t(i_rMapped.m_Root)].m_Name;
+	return json;
+}
+
+VJson ToJson(const std::vector<SetupProposal::VPoseFinding>& i_rFindings)
+{
+	VJson list = VJson::array();
+	for (const auto& rFinding : i_rFindings)
+	{
+		VJson numbers = VJson::object();
+		for (const auto& [pName, value] : rFinding.m_Numbers)
+			numbers[pName] = std::round(1e4 * value) / 1e4;
+		list.push_back({{"id", rFinding.m_pId}, {"fine", rFinding.m_bFine}, {"message", rFinding.m_Message},
+		    {"numbers", numbers}, {"options", rFinding.m_Options}});
+	}
+	return list;
+}
+
+std::string KindOf(const VProposedPair& i_rPair)
+{
+	std::string text;
+	if (i_rPair.m_PositionWeight > 0.0)
+		text += "position " + Shortest(i_rPair.m_PositionWeight);
+	if (i_rPair.m_RotationWeight > 0.0)
+		text += (text.empty() ? "rotation " : ", rotation ") + Shortest(i_rPair.m_RotationWeight);
+	return text;
+}
+
+std::string Joined(const std::vector<std::string>& i_rTexts)
+{
+	std::string joined;
+	for (const std::string& rText : i_rTexts)
+		joined += (joined.empty() ? "" : "; ") + rText;
+	return joined;
+}
+
+std::string TableOf(const std::vector<VProposedPair>& i_rPairs, const VMapped& i_rMapped)
+{
+	VTable table;
+	table.AddColumn("SCORE", VTable::ERight);
+	table.AddColumn("SOURCE", VTable::ELeft);
+	table.AddColumn("TARGET", VTable::ELeft);
+	table.AddColumn("KIND AND WEIGHT", VTable::ELeft);
+	table.AddColumn("REASONS", VTable::ELeft);
+	for (const VProposedPair& rPair : i_rPairs)
+		table.AddRow({Fixed(rPair.m_Score, 2), i_rMapped.m_Source[rPair.m_Source].m_Name,
+		    i_rMapped.m_Target[rPair.m_Target].m_Name, KindOf(rPair), Joined(rPair.m_Reasons)});
+	return table.Text(HasColours(STDOUT_FILENO));
+}
+
+std::string ListOf(const std::vector<SetupProposal::VUnmapped>& i_rUnmapped, const VRestSkeleton& i_rSkeleton)
+{
+	std::string text;
+	for (const auto& rUnmapped : i_rUnmapped)
+		text += "  " + Printable(i_rSkeleton[rUnmapped.m_Joint].m_Name) + ": " + rUnmapped.m_Reason + "\n";
+	return text.empty() ? "  none\n" : text;
+}
+
+std::string ToText(const VMapped& i_rMapped)
+{
+	const SetupProposal::VProposal& rProposal = i_rMapped.m_Proposal;
+	std::string text = TableOf(rProposal.m_Pairs, i_rMapped);
+	if (!rProposal.m_Alternatives.empty())
+		text += "\nAlternatives\n" + TableOf(rProposal.m_Alternatives, i_rMapped);
+	text += "\nWithout a pair, of the source\n" + ListOf(rProposal.m_UnmappedSources, i_rMapped.m_Source);
+	text += "\nWithout a pair, of the target\n" + ListOf(rProposal.m_UnmappedTargets, i_rMapped.m_Target);
+	if (i_rMapped.m_Root >= 0)
+		text += "\nThe body's root is " + Printable(i_rMapped.m_Target[std::size_t(i_rMapped.m_Root)].m_Name) + "\n";
+	return text;
+}
+
+std::string ToText(const std::vector<SetupProposal::VPoseFinding>& i_rFindings)
+{
+	std::string text;
+	for (const auto& rFinding : i_rFindings)
+	{
+		text += std::string(rFinding.m_bFine ? "  fine  " : "  look  ") + rFinding.m_pId + ": "
+		    + Printable(rFinding.m_Message) + "\n";
+		if (!rFinding.m_Options.empty())
+			text += "        " + Printable(rFinding.m_Options) + "\n";
+	}
+	return text.empty() ? text : "\nAt rest, with the options of create and edit that mend it\n" + text;
+}
+
+EExitStatus Map(const VMapSettings& i_rSettings)
+{
+	if (i_rSettings.m_Fbx.empty() == i_rSettings.m_Subject.empty())
+		throw VCommandError(EWrongUsage, "Give a character: either --fbx FILE or a retarget subject");
+	VSession session;
+	session.LoadSource(i_rSettings.m_Source);
+	if (!i_rSettings.m_Fbx.empty())
+		session.LoadFbx(i_rSettings.m_Fbx);
+	else
+		session.LoadTarget(i_rSettings.m_Subject);
+	if (!i_rSettings.m_MinimumScore.empty())
+		session.m_MinimumScore = ParseScore(i_rSettings.m_MinimumScore);
+	const VMapped mapped = i_rSettings.m_Fbx.empty() ? ProposeForSubject(session) : ProposeForFile(session);
+	const auto findings = SetupProposal::CheckPose(mapped.m_Source, mapped.m_Target, mapped.m_Proposal);
+	VJson json = ToJson(mapped);
+	json["pose"] = ToJson(findings);
+	PrintResult(json, ToText(mapped) + ToText(findings));
+	return EFine;
+}
+
+} // namespace
+
+VCommand AddMapCommand(CLI::App& io_rProgram)
+{
+	CLI::App* const pApp = AddCommand(io_rProgram, "map",
+	    "Propose which segment of a performer belongs to which of a character, with a score from 0 to 1 and the "
+	    "reasons: "
+	    "names, the tree and the rest pose. It also looks whether the two face the same way and stand alike. Kinds and "
+	    "weights are what the targets of a pair should get. Nothing is "
+	    "written: \"create --auto\" and \"edit --auto\" take the pairs over",
+	    {"map --source performer.qrs --fbx hero.fbx", "map hero.qrr --source performer.qrs --min-score 0.7",
+	        "map --source performer.qrs --fbx hero.fbx --json | jq -r '.pairs[] | .source + \":\" + .target'"});
+	const auto pSettings = std::make_shared<VMapSettings>();
+	pApp->add_option("IN.qrr", pSettings->m_Subject, "A retarget subject, in place of an FBX file");
+	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton")->option_text("FILE.qrs")->required();
+	pApp->add_option("--fbx", pSettings->m_Fbx, "The character's FBX file")->option_text("FILE");
+	pApp->add_option("--min-score", pSettings->m_MinimumScore,
+	        "Propose no pair that scores less: from 0 to 1, 0.5 if left out; what it keeps out stands with the "
+	        "alternatives")
+	    ->option_text("SCORE");
+	return {pApp, [pSettings] { return Map(*pSettings); }};
+}
+
+} // namespace CommandLine

@@ -1,0 +1,96 @@
+#include "retarget/subject/Mapping.h"
+
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/subject/Elements.h"
+
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupCore/RestSkeletons.h"
+#include "RetargetSetupCore/TargetConstruction.h"
+
+#include <utility>
+
+namespace CommandLine
+{
+namespace
+{
+
+SetupProposal::VRestSkeleton RestOfSource(VSession& io_rSession)
+{
+	io_rSession.Source("A proposal");
+	const auto values = io_rSession.Document().SourceValues();
+	return RetargetSetup::RestOf(*values.m_pParametrised, *values.m_pSubject);
+}
+
+VMapped Mapped(VSession& io_rSession, SetupProposal::VRestSkeleton i_Target)
+{
+	VMapped mapped{RestOfSource(io_rSession), std::move(i_Target), {}, -1};
+	if (mapped.m_Source.empty() || mapped.m_Target.empty())
+		throw VCommandError(EBadInput, "The segments of the source or the target make no tree, so nothing is proposed");
+	mapped.m_Proposal = SetupProposal::Propose(mapped.m_Source, mapped.m_Target, io_rSession.m_MinimumScore);
+	mapped.m_Root = SetupProposal::BodyRoot(mapped.m_Proposal, mapped.m_Target);
+	return mapped;
+}
+
+void Add(VSession& io_rSession, const SetupProposal::VProposedPair& i_rPair, bool i_bPosition, double i_Weight)
+{
+	const std::size_t index = io_rSession.Target().m_Targets.size();
+	io_rSession.Document().AddTarget(int(i_rPair.m_Source), int(i_rPair.m_Target), i_bPosition, false);
+	CoreOrlexTypes::VSubjectParametrised subject = io_rSession.Target();
+	// The pair has one of this kind.
+	if (subject.m_Targets.size() == index)
+		return;
+	subject.m_Targets[index].m_Weight = i_Weight;
+	io_rSession.Document().SetTargetSubjectParametrised(subject);
+}
+
+} // namespace
+
+double ParseScore(const std::string& i_rWord)
+{
+	const double score = ParseFinite(i_rWord, "--min-score");
+	if (score < 0.0 || score > 1.0)
+		throw VCommandError(EWrongUsage, "--min-score: a score is from 0 to 1, not " + i_rWord);
+	return score;
+}
+
+VMapped ProposeForFile(VSession& io_rSession, const std::optional<std::size_t>& i_rRoot)
+{
+	VRetargetSetupCore& rDocument = io_rSession.Document();
+	const auto pSkeleton = rDocument.GetFBXSkeleton();
+	return Mapped(io_rSession,
+	    RetargetSetup::RestOf(i_rRoot ? RetargetSetup::ExtractSubtree(*pSkeleton, *i_rRoot) : *pSkeleton,
+	        rDocument.GetTargetAxisMatrix()));
+}
+
+VMapped ProposeForSubject(VSession& io_rSession)
+{
+	if (io_rSession.m_Root)
+		return ProposeForFile(io_rSession, io_rSession.m_Root);
+	const auto values = io_rSession.Document().TargetValues();
+	return Mapped(io_rSession, RetargetSetup::RestOf(*values.m_pParametrised, *values.m_pSubject));
+}
+
+void AddProposedTargets(VSession& io_rSession)
+{
+	const VMapped mapped = ProposeForSubject(io_rSession);
+	const auto& rProposal = mapped.m_Proposal;
+	if (rProposal.m_Pairs.empty())
+		throw VCommandError(EFindings,
+		    "--auto: no pair of segments scores enough; \"retarget map\" shows what there is, --min-score before "
+		    "--auto "
+		    "asks for less");
+	const bool bEachPairOnce = std::exchange(io_rSession.Rules().m_bEachPairOnce, true);
+	for (const SetupProposal::VProposedPair& rPair : rProposal.m_Pairs)
+	{
+		if (rPair.m_PositionWeight > 0.0)
+			Add(io_rSession, rPair, true, rPair.m_PositionWeight);
+		if (rPair.m_RotationWeight > 0.0)
+			Add(io_rSession, rPair, false, rPair.m_RotationWeight);
+	}
+	io_rSession.Rules().m_bEachPairOnce = bEachPairOnce;
+	NVX_LOG(c_pCategory, NVX::ELogInformation, "--auto: %1% pairs of segments, %2% segments of the source without one",
+	    rProposal.m_Pairs.size(), rProposal.m_UnmappedSources.size());
+}
+
+} // namespace CommandLine

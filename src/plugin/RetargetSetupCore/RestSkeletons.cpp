@@ -1,0 +1,40 @@
+#include "RetargetSetupCore/RestSkeletons.h"
+
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "RetargetSetupCore/BindPose.h"
+#include "RetargetSetupCore/TargetConstruction.h"
+
+using CoreOrlexTypes::VSubjectParametrised;
+using SetupProposal::VRestSkeleton;
+
+namespace RetargetSetup
+{
+
+VRestSkeleton RestOf(const VSubjectParametrised& i_rParametrised, const CoreOrlexTypes::VSubject& i_rSubject)
+{
+	VRestSkeleton skeleton;
+	const auto pFK = KinematicsInBindPose(i_rParametrised, i_rSubject, "compared");
+	if (!pFK)
+		return skeleton;
+	const std::vector<Rotation::VPose<double>> poses = SegmentPoses(*pFK);
+	for (std::size_t i = 0; i < poses.size(); ++i)
+	{
+		const VSubjectParametrised::VSegment& rSegment = i_rParametrised.m_Segments[i];
+		const std::uint32_t parent = i_rSubject.m_Segments[i].m_ParentSegmentIndex;
+		skeleton.push_back({rSegment.m_Name, parent == CoreOrlexTypes::c_NoParent ? -1 : std::int64_t(parent),
+		    poses[i].t, rSegment.m_Joint.m_JointType != VSubjectParametrised::VJoint::EDummy});
+	}
+	return skeleton;
+}
+
+VRestSkeleton RestOf(const FBXIO::VSkinSkeleton& i_rSkeleton, const Rotation::VMatrix4& i_rAxis)
+{
+	VRestSkeleton skeleton;
+	const std::vector<Rotation::VPose<double>> poses = PosesInFile(i_rSkeleton, i_rAxis, 1.0);
+	for (std::size_t i = 0; i < i_rSkeleton.size(); ++i)
+		skeleton.push_back(
+		    {std::string(StripNamespace(i_rSkeleton[i].m_Name)), i_rSkeleton[i].m_ParentIndex, poses[i].t, true});
+	return skeleton;
+}
+
+} // namespace RetargetSetup

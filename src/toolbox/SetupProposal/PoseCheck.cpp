@@ -1,0 +1,209 @@
+#include "SetupProposal/PoseCheck.h"
+
+#include "math/NumberText.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numbers>
+#include <optional>
+
+namespace SetupProposal
+{
+namespace
+{
+
+/// Differences up to these are fine: degrees, a share of the height, parts of the body's height.
+constexpr double c_FineFacing = 20.0;
+constexpr double c_FineLimb = 12.0;
+constexpr double c_FineScale = 0.02;
+/// Where the lowest joint, of a toe or an ankle, stands over the floor.
+constexpr double c_FineAbove = 0.08;
+constexpr double c_FineBelow = 0.02;
+
+constexpr double c_Degrees = 180.0 / std::numbers::pi;
+
+struct VBody
+{
+	const VRestSkeleton& m_rSkeleton;
+	const VBodyReading& m_rReading;
+
+	/// Where the likeliest joint of a part and side stands.
+	std::optional<std::size_t> Joint(EBodyPart i_Part, ESide i_Side = ESide::None) const
+	{
+		std::optional<std::size_t> best;
+		for (std::size_t i = 0; i < m_rSkeleton.size(); ++i)
+		{
+			const VJointReading& rJoint = m_rReading.m_Joints[i];
+			if (rJoint.m_Part == i_Part && (i_Side == ESide::None || rJoint.m_Side == i_Side)
+			    && (!best || rJoint.m_Likely[i_Part] > m_rReading.m_Joints[*best].m_Likely[i_Part] + 0.2))
+				best = i;
+		}
+		return best;
+	}
+
+	/// How far a limb is lowered from the horizontal, in degrees: the mean of both sides.
+	std::optional<double> LimbAngle(EBodyPart i_From, EBodyPart i_To) const
+	{
+		double sum = 0.0;
+		int sides = 0;
+		for (const ESide side : {ESide::Left, ESide::Right})
+		{
+			const auto from = Joint(i_From, side);
+			const auto to = Joint(i_To, side);
+			if (!from || !to)
+				continue;
+			const auto& rFrom = m_rSkeleton[*from].m_Place;
+			const auto& rTo = m_rSkeleton[*to].m_Place;
+			sum += c_Degrees * std::atan2(rFrom[2] - rTo[2], std::hypot(rTo[0] - rFrom[0], rTo[1] - rFrom[1]));
+			++sides;
+		}
+		return sides == 0 ? std::nullopt : std::optional(sum / sides);
+	}
+
+	/// The lowest joint of the legs.
+	std::optional<std::size_t> Lowest() const
+	{
+		std::optional<std::size_t> lowest;
+		for (std::size_t i = 0; i < m_rSkeleton.size(); ++i)
+		{
+			const EBodyPart part = m_rReading.m_Joints[i].m_Part;
+			if ((part == EFoot || part == EToe)
+			    && (!lowest || m_rSkeleton[i].m_Place[2] < m_rSkeleton[*lowest].m_Place[2]))
+				lowest = i;
+		}
+		return lowest;
+	}
+
+	/// Of the thighs over the lowest joint of the legs: a pelvis may stand above them.
+	std::optional<double> HipHeight() const
+	{
+		const auto lowest = Lowest();
+		const auto left = Joint(EThigh, ESide::Left);
+		const auto right = Joint(EThigh, ESide::Right);
+		if (!lowest || !left || !right)
+			return std::nullopt;
+		const double height =
+		    0.5 * (m_rSkeleton[*left].m_Place[2] + m_rSkeleton[*right].m_Place[2]) - m_rSkeleton[*lowest].m_Place[2];
+		return height > 0.0 ? std::optional(height) : std::nullopt;
+	}
+};
+
+std::string Rounded(double i_Value, double i_Step)
+{
+	std::string text = NumberText::PrintF(std::round(i_Value / i_Step) * i_Step);
+	text.erase(text.find_last_not_of('0') + 1);
+	return text.ends_with('.') ? text.substr(0, text.size() - 1) : text;
+}
+
+VPoseFinding Facing(const VBody& i_rSource, const VBody& i_rTarget)
+{
+	const auto& rSource = i_rSource.m_rReading.m_Frame.m_Forward;
+	const auto& rTarget = i_rTarget.m_rReading.m_Frame.m_Forward;
+	// To the left, seen from above, of what turns the target to the source.
+	const double turn = c_Degrees
+	    * std::atan2(
+	        rTarget[0] * rSource[1] - rTarget[1] * rSource[0], rTarget[0] * rSource[0] + rTarget[1] * rSource[1]);
+	VPoseFinding finding{"facing", std::abs(turn) <= c_FineFacing, "", {{"turnDegrees", turn}}, ""};
+	finding.m_Message = finding.m_bFine
+	    ? "Both face the same way"
+	    : "The character faces another way than the performer: it is to turn by " + Rounded(turn, 1.0) + " degrees";
+	if (!finding.m_bFine)
+		finding.m_Options = "--turn " + Rounded(turn, 0.1) + " --update-targets";
+	return finding;
+}
+
+VPoseFinding Sides(const VBody& i_rSource, const VBody& i_rTarget)
+{
+	const bool bSource = i_rSource.m_rReading.m_Frame.m_bContradiction;
+	const bool bTarget = i_rTarget.m_rReading.m_Frame.m_bContradiction;
+	VPoseFinding finding{"sides", !bSource && !bTarget, "Left is on the left of both", {}, ""};
+	if (!finding.m_bFine)
+		finding.m_Message = std::string("By the way that the feet point, the names of the ")
+		    + (bSource && bTarget ? "performer and the character"
+		            : bSource     ? "performer"
+		                          : "character")
+		    + " tell left on the right: look whether they are exchanged, or the feet stand backwards";
+	return finding;
+}
+
+VPoseFinding Limbs(const char* i_pId, const char* i_pWhat, double i_Source, double i_Target,
+    const std::vector<std::string>& i_rSegments)
+{
+	VPoseFinding finding{i_pId, std::abs(i_Source - i_Target) <= c_FineLimb, "",
+	    {{"sourceDegrees", i_Source}, {"targetDegrees", i_Target}}, ""};
+	finding.m_Message = std::string("The ") + i_pWhat + " of the performer are lowered by " + Rounded(i_Source, 1.0)
+	    + " degrees from the horizontal, those of the character by " + Rounded(i_Target, 1.0);
+	if (finding.m_bFine)
+		return finding;
+	for (const std::string& rSegment : i_rSegments)
+		finding.m_Options += "--pose " + rSegment + "=RX,RY,RZ ";
+	finding.m_Options += "--update-targets";
+	return finding;
+}
+
+VPoseFinding Scale(double i_Source, double i_Target)
+{
+	const double scale = i_Source / i_Target;
+	VPoseFinding finding{"scale", std::abs(scale - 1.0) <= c_FineScale, "",
+	    {{"sourceHipHeightMm", i_Source}, {"targetHipHeightMm", i_Target}, {"scale", scale}}, ""};
+	finding.m_Message = "The hips of the performer stand " + Rounded(i_Source, 1.0)
+	    + " mm over the lowest joint of the feet, those of the character " + Rounded(i_Target, 1.0) + " mm";
+	if (!finding.m_bFine)
+		finding.m_Options = "--root-height scale --scale " + Rounded(scale, 0.001) + " --update-targets";
+	return finding;
+}
+
+VPoseFinding Floor(const VBody& i_rTarget, std::size_t i_Lowest, double i_HipHeight)
+{
+	const VRestJoint& rLowest = i_rTarget.m_rSkeleton[i_Lowest];
+	const double height = rLowest.m_Place[2];
+	VPoseFinding finding{"floor", height <= c_FineAbove * i_HipHeight && height >= -c_FineBelow * i_HipHeight, "",
+	    {{"lowestMm", height}}, ""};
+	finding.m_Message = "The lowest joint of the character's feet, \"" + rLowest.m_Name + "\", stands "
+	    + Rounded(std::abs(height), 0.1) + " mm " + (height < 0.0 ? "below" : "above") + " the floor";
+	if (!finding.m_bFine)
+		finding.m_Options = "--lift " + Rounded(-height, 0.1) + " --update-targets";
+	return finding;
+}
+
+} // namespace
+
+std::vector<VPoseFinding> CheckPose(
+    const VRestSkeleton& i_rSource, const VRestSkeleton& i_rTarget, const VProposal& i_rProposal)
+{
+	const VBody source{i_rSource, i_rProposal.m_Source};
+	const VBody target{i_rTarget, i_rProposal.m_Target};
+	std::vector<VPoseFinding> findings;
+	if (i_rProposal.m_Pairs.empty())
+		return findings;
+	findings.push_back(Facing(source, target));
+	findings.push_back(Sides(source, target));
+	struct VLimbs
+	{
+		const char* m_pId;
+		const char* m_pWhat;
+		EBodyPart m_From;
+		EBodyPart m_To;
+	};
+	for (const VLimbs& rLimbs : {VLimbs{"arms", "arms", EUpperArm, EHand}, VLimbs{"legs", "legs", EThigh, EFoot}})
+	{
+		const auto ofSource = source.LimbAngle(rLimbs.m_From, rLimbs.m_To);
+		const auto ofTarget = target.LimbAngle(rLimbs.m_From, rLimbs.m_To);
+		if (!ofSource || !ofTarget)
+			continue;
+		std::vector<std::string> segments;
+		for (const ESide side : {ESide::Left, ESide::Right})
+			if (const auto joint = target.Joint(rLimbs.m_From, side))
+				segments.push_back(i_rTarget[*joint].m_Name);
+		findings.push_back(Limbs(rLimbs.m_pId, rLimbs.m_pWhat, *ofSource, *ofTarget, segments));
+	}
+	const auto sourceHips = source.HipHeight();
+	const auto targetHips = target.HipHeight();
+	if (sourceHips && targetHips)
+		findings.push_back(Scale(*sourceHips, *targetHips));
+	if (targetHips)
+		findings.push_back(Floor(target, *target.Lowest(), *targetHips));
+	return findings;
+}
+
+} // namespace SetupProposal

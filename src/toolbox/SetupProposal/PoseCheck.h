@@ -1,0 +1,30 @@
+#pragma once
+
+#include "SetupProposal/Proposal.h"
+
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace SetupProposal
+{
+
+/// One thing in which a character at rest may differ from the performer.
+struct VPoseFinding
+{
+	/// "facing", "sides", "arms", "legs", "scale", "floor": as scripts know it.
+	const char* m_pId = "";
+	bool m_bFine = true;
+	/// A sentence for the operator.
+	std::string m_Message;
+	/// By name, with the unit at its end: "sourceDegrees".
+	std::vector<std::pair<const char*, double>> m_Numbers;
+	/// Options of "retarget edit" and "create" that mend it; empty if it is fine, or no option does.
+	std::string m_Options;
+};
+
+/// All of them that the two skeletons have the joints for, whether fine or not.
+std::vector<VPoseFinding> CheckPose(
+    const VRestSkeleton& i_rSource, const VRestSkeleton& i_rTarget, const VProposal& i_rProposal);
+
+} // namespace SetupProposal

@@ -1,0 +1,32 @@
+#pragma once
+
+#include "numerics/Rotation.h"
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+namespace SetupProposal
+{
+
+/// A joint where it stands at rest.
+struct VRestJoint
+{
+	/// Without a namespace.
+	std::string m_Name;
+	/// Index of a joint before this one, -1 for a root.
+	std::int64_t m_Parent = -1;
+	/// In the world, in mm, Z up.
+	Rotation::VVector3 m_Place{};
+	/// False if it is fixed to its parent: nothing of it is there to follow.
+	bool m_bMoves = true;
+};
+
+/// Parents stand before their children; there may be several roots.
+using VRestSkeleton = std::vector<VRestJoint>;
+
+/// The same with every parent before its children, and every place a number: what a damaged file breaks counts as a
+/// root, and as the origin.
+VRestSkeleton Sound(VRestSkeleton i_Skeleton);
+
+} // namespace SetupProposal
