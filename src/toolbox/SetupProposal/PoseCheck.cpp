@@ -136,7 +136,11 @@ VPoseFinding Limbs(const char* i_pId, const char* i_pWhat, double i_Source, doub
 	if (finding.m_bFine)
 		return finding;
 	for (const std::string& rSegment : i_rSegments)
-		finding.m_Options += "--pose " + rSegment + "=RX,RY,RZ ";
+	{
+		// As a shell takes it.
+		const char* const pQuote = rSegment.find(' ') == std::string::npos ? "" : "'";
+		finding.m_Options += std::string("--pose ") + pQuote + rSegment + "=RX,RY,RZ" + pQuote + " ";
+	}
 	finding.m_Options += "--update-targets";
 	return finding;
 }
