@@ -43,7 +43,8 @@ std::int64_t ByPlaces(const VRestSkeleton& i_rSkeleton, const std::vector<VNameW
 		const VBodyPlace other = PlaceIn(frame, i_rSkeleton[i].m_Place);
 		const bool bSameSide = i_rNames[i].m_Side != ESide::None && i_rNames[i].m_Side == i_rNames[i_Joint].m_Side;
 		const double away = FromMirrorImage(place, other);
-		if (i != i_Joint && !bSameSide && other.m_Left * place.m_Left < 0.0 && away < least)
+		// One that has a partner by its name is no one else's.
+		if (i != i_Joint && !bSameSide && other.m_Left * place.m_Left < 0.0 && away < least && ByNames(i_rNames, i) < 0)
 		{
 			least = away;
 			nearest = std::int64_t(i);
