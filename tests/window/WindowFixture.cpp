@@ -1,6 +1,7 @@
 #include "WindowFixture.h"
 
 #include "../QtApplication.h"
+#include "studio/host/OpenGLCheck.h"
 #include "studio/host/Preferences.h"
 #include "studio/host/Services.h"
 #include "studio/panel/RetargetPanel.h"
@@ -10,6 +11,7 @@
 #include <QFile>
 #include <QProcess>
 #include <QQuickWidget>
+#include <QStyleHints>
 #include <QTest>
 
 namespace
@@ -22,6 +24,10 @@ namespace
 
 void Window::SetUp()
 {
+	StudioHost::CheckOpenGL();
+	// Each blink of a text cursor would draw the whole panel.
+	if (qEnvironmentVariableIsSet("LIBGL_ALWAYS_SOFTWARE"))
+		ASSERT_EQ(QGuiApplication::styleHints()->cursorFlashTime(), 0);
 	const std::string folder = m_Folder.path().toStdString();
 	QFile::copy(RETARGET_SOURCE "/demo/performer.qrs", m_Folder.filePath("performer.qrs"));
 	QFile::copy(RETARGET_SOURCE "/demo/character.fbx", m_Folder.filePath("character.fbx"));

@@ -1,11 +1,13 @@
 #include "studio/host/OpenGLCheck.h"
 
+#include "CoreGraphics/RenderContext.h"
 #include "DebugServices/GlobalLog.h"
 
 #include <QGuiApplication>
 #include <QOffscreenSurface>
 #include <QOpenGLContext>
 #include <QQuickWindow>
+#include <QStyleHints>
 
 namespace StudioHost
 {
@@ -15,8 +17,12 @@ bool CheckOpenGL()
 	QOffscreenSurface surface;
 	surface.create();
 	QOpenGLContext context;
-	if (QQuickWindow::sceneGraphBackend() != QLatin1String("software") && context.create()
-	    && context.makeCurrent(&surface))
+	const bool bOpenGL = QQuickWindow::sceneGraphBackend() != QLatin1String("software") && context.create()
+	    && context.makeCurrent(&surface);
+	// Each blink draws a whole panel.
+	if (!bOpenGL || CoreGraphics::IsSoftware(*context.functions()))
+		QGuiApplication::styleHints()->setCursorFlashTime(0);
+	if (bOpenGL)
 		return true;
 	NVX_LOG("CoreGraphics", NVX::ELogWarning,
 	    "This display (%1%) has no OpenGL: the preview stays empty, all else works. On a remote screen, "

@@ -50,6 +50,8 @@ QVector2D AsVector(const QSize& i_rSize)
 	return {static_cast<float>(i_rSize.width()), static_cast<float>(i_rSize.height())};
 }
 
+} // namespace
+
 bool IsSoftware(QOpenGLFunctions& i_rFunctions)
 {
 	const auto* const pName = reinterpret_cast<const char*>(i_rFunctions.glGetString(GL_RENDERER));
@@ -60,8 +62,6 @@ bool IsSoftware(QOpenGLFunctions& i_rFunctions)
 			return true;
 	return false;
 }
-
-} // namespace
 
 void VRenderContext::Initialise()
 {

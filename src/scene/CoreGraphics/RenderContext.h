@@ -52,6 +52,9 @@ enum EModifierState : std::uint32_t
 	EModifierToggle
 };
 
+/// Whether the processor draws. With a context current.
+bool IsSoftware(QOpenGLFunctions& i_rFunctions);
+
 /// OpenGL as the renderers use it: the matrices and vectors of the frame, the program in use, and plain records of
 /// state. One renderer owns it, on the render thread; every method needs the context that Initialise took.
 class VRenderContext
