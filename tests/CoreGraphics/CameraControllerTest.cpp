@@ -192,6 +192,16 @@ TEST_F(CameraController, OrbitTurnsTheFreeViewAlone)
 	}
 }
 
+TEST_F(CameraController, TheWheelInFixedViewsIsTheHostsChoice)
+{
+	m_Camera.m_Type = CoreGraphics::ECameraLeft;
+	m_Camera.Wheel(-120);
+	EXPECT_FLOAT_EQ(m_Camera.m_OrthographicScale, 4.0f);
+	m_Camera.Wheel(-120, true);
+	EXPECT_FLOAT_EQ(m_Camera.m_OrthographicScale, 4.4f);
+	EXPECT_FLOAT_EQ(m_Camera.m_Distance, 7700.0f) << "of the free view";
+}
+
 TEST_F(CameraController, DollyAndWheelStayWithinTheirLimits)
 {
 	Drag(EButtonRight, {0, 0}, {0, 10});

@@ -50,12 +50,23 @@ void VEye::Pan(const QPointF& i_rMove)
 	m_Centre -= PixelSize(m_Centre) * (Turn().transpose() * Vector3d(i_rMove.x(), -i_rMove.y(), 0.0));
 }
 
-void VEye::Frame(const Vector3d& i_rPoint)
+void VEye::Frame(const std::vector<Vector3d>& i_rPoints)
 {
 	constexpr double c_Margin = 250.0;
-	m_Centre = i_rPoint;
-	const double narrower = std::min(1.0, m_Size.width() / m_Size.height());
-	m_Distance = c_Margin / std::sin(std::atan(narrower * std::tan(c_HalfField)));
+	Eigen::AlignedBox3d box;
+	for (const Vector3d& rPoint : i_rPoints)
+		box.extend(rPoint);
+	m_Centre = box.center();
+	m_Distance = 0.0;
+	const double upright = std::tan(c_HalfField), across = upright * m_Size.width() / m_Size.height();
+	for (const Vector3d& rPoint : i_rPoints)
+	{
+		// The cone's edge at the point's depth, and the sphere of the margin that touches it.
+		const Vector3d seen = Turn() * (rPoint - m_Centre);
+		for (const auto& [aside, slope] : {std::pair(seen.x(), across), std::pair(seen.y(), upright)})
+			m_Distance =
+			    std::max(m_Distance, seen.z() + std::abs(aside) / slope + c_Margin / std::sin(std::atan(slope)));
+	}
 }
 
 VSkeleton ReadSkeleton(const QByteArray& i_rJson)

@@ -8,6 +8,7 @@
 
 #include <map>
 #include <string>
+#include <vector>
 
 /// The camera of the preview as its users know it, and what it shows, by arithmetic that shares nothing with the
 /// preview's own. Millimetres, degrees, pixels from the upper left corner; Z is up.
@@ -33,8 +34,8 @@ struct VEye
 	void Orbit(const QPointF& i_rMove);
 	void Pan(const QPointF& i_rMove);
 	void Dolly(const QPointF& i_rMove) { m_Distance += 15.0 * i_rMove.y(); }
-	/// Fills the view with a point and the margin round it.
-	void Frame(const Eigen::Vector3d& i_rPoint);
+	/// Fills the view with points and the margin round each.
+	void Frame(const std::vector<Eigen::Vector3d>& i_rPoints);
 };
 
 /// Segments of a subject in the world.

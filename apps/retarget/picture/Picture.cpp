@@ -51,21 +51,6 @@ OrlexGraphics::VSceneOptions ViewOptions()
 	return options;
 }
 
-/// All segments of both subjects, as the preview knows them.
-std::vector<NVX::ISelectionItem> Segments(const VRetargetSetupCore& i_rDocument)
-{
-	std::vector<NVX::ISelectionItem> items;
-	const auto add = [&](const VRetargetSetupCore::VSubjectValues& i_rValues, std::uint32_t i_Kind)
-	{
-		if (i_rValues.m_pParametrised)
-			for (std::uint32_t i = 0; i < i_rValues.m_pParametrised->m_Segments.size(); ++i)
-				items.push_back({i_Kind, i_rValues.m_pParametrised->m_SubjectId, i, {}});
-	};
-	add(i_rDocument.SourceValues(), NVX::ESelectionSourceSegment);
-	add(i_rDocument.TargetValues(), NVX::ESelectionTargetSegment);
-	return items;
-}
-
 /// With a context current.
 QImage Draw(VSession& io_rSession, const VRenderSettings& i_rSettings)
 {
@@ -98,7 +83,7 @@ QImage Draw(VSession& io_rSession, const VRenderSettings& i_rSettings)
 	renderer.Update();
 	pScene->Synchronise();
 	rCamera.m_bYUp = pScene->YUp();
-	rCamera.Fit(pScene->GetBounds(Segments(io_rSession.Document())), true);
+	rCamera.Fit(pScene->GetBounds(pScene->ItemsToFrame()), true);
 	renderer.Render(target);
 	renderer.Paint();
 	return target.toImage();

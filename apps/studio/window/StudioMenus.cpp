@@ -225,7 +225,7 @@ void VStudioWindow::ShowMouseAndKeys()
 	const std::pair<QString, QString> rows[] = {{with(!bAltSelects, tr("left button, dragged")), tr("turns the view")},
 	    {with(!bAltSelects, tr("left and right or middle button, dragged")), tr("moves the view")},
 	    {with(!bAltSelects, tr("right button, dragged; or the wheel")), tr("goes nearer and farther")},
-	    {tr("Ctrl+F"), tr("brings what is selected into the middle")},
+	    {tr("Ctrl+F"), tr("brings what is selected into the middle, or all where nothing is")},
 	    {tr("click"), tr("selects what is under the mouse, and nothing else")},
 	    {tr("Shift and click"), tr("adds it to what is selected")},
 	    {tr("Ctrl and click"), tr("adds it, or takes it away")}, {tr("Ctrl, Shift and click"), tr("takes it away")},

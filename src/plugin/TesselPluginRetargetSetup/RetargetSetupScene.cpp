@@ -8,9 +8,11 @@
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/Mirror.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
+#include "RetargetSetupCore/SideOfName.h"
 #include "RetargetSetupDocument/StaleSelection.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "TesselPluginRetargetSetup/ManipulatorMove.h"
+#include "TesselPluginRetargetSetup/SideSeen.h"
 
 #include <utility>
 
@@ -64,6 +66,45 @@ QVariantMap VRetargetSetupScene::ViewOptions()
 	};
 }
 
+bool VRetargetSetupScene::WheelInFixedViews() const
+{
+	return m_pRetargetSetup->HostRules().m_bWheelInFixedViews;
+}
+
+std::vector<ISelectionItem> VRetargetSetupScene::ItemsToFrame() const
+{
+	std::vector<ISelectionItem> items;
+	const auto add = [&](const VRetargetSetup::VSubjectValues& i_rValues, std::uint32_t i_Kind)
+	{
+		if (i_rValues.m_pParametrised)
+			for (std::uint32_t i = 0; i < i_rValues.m_pParametrised->m_Segments.size(); ++i)
+				items.push_back({i_Kind, i_rValues.m_pParametrised->m_SubjectId, i, {}});
+	};
+	add(m_pRetargetSetup->SourceValues(), NVX::ESelectionSourceSegment);
+	add(m_pRetargetSetup->TargetValues(), NVX::ESelectionTargetSegment);
+	return items;
+}
+
+QString VRetargetSetupScene::SideSeen(int i_CameraType) const
+{
+	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
+	if (!pSubject)
+		return {};
+	// Sums, and counts behind them.
+	QVector4D left, right;
+	for (std::size_t i = 0; i < pSubject->m_Segments.size(); ++i)
+	{
+		const RetargetSetup::ESide side = RetargetSetup::SideOfName(pSubject->m_Segments[i].m_Name);
+		QMatrix4x4 matrix;
+		if (side != RetargetSetup::ESide::None && GetItemTransform({TargetSegment(i)}, matrix))
+			(side == RetargetSetup::ESide::Left ? left : right) += matrix.column(3);
+	}
+	if (left.w() == 0.0f || right.w() == 0.0f)
+		return {};
+	return QString::fromUtf8(RetargetSetup::SideSeen(
+	    left.toVector3DAffine() - right.toVector3DAffine(), YUp(), static_cast<std::uint32_t>(i_CameraType)));
+}
+
 void VRetargetSetupScene::OnShared()
 {
 	auto pPose = std::make_unique<Flow2Utils::VParameterTyped<std::uint32_t>>("PoseIndex");
@@ -81,6 +122,7 @@ void VRetargetSetupScene::OnShared()
 	SkinCache()->ChangedSignal().Connect(WeakBind(&VRetargetSetupScene::RefreshScene), Dispatcher());
 	m_pRetargetSetup->GetChangedSignal().Connect(WeakBind(&VRetargetSetupScene::OnSetupChanged), Dispatcher());
 	PublishedSignal().Connect(WeakBind(&VRetargetSetupScene::UpdateManipulator), Dispatcher());
+	PublishedSignal().Connect(WeakBind(&VRetargetSetupScene::framePublished), Dispatcher());
 }
 
 void VRetargetSetupScene::OnSetupChanged()
@@ -101,6 +143,15 @@ void VRetargetSetupScene::RefreshScene()
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pPosed;
 	m_pSubjectTransform->Transform(pPosed, pFrame, 0);
 	SetFrame(pPosed);
+	const auto appears = [](const VRetargetSetup::VSubjectValues& i_rValues, bool& io_rbShown)
+	{
+		const bool bShown = i_rValues.m_pParametrised && !i_rValues.m_pParametrised->m_Segments.empty();
+		return !std::exchange(io_rbShown, bShown) && bShown;
+	};
+	const bool bSource = appears(m_pRetargetSetup->SourceValues(), m_bShowsSource);
+	const bool bTarget = appears(m_pRetargetSetup->TargetValues(), m_bShowsTarget);
+	if (bSource || bTarget)
+		emit subjectAppeared();
 }
 
 std::int64_t VRetargetSetupScene::GetSelectedTargetSegment(std::vector<ISelectionItem>& o_rSelection) const

@@ -29,6 +29,8 @@ class VRetargetSetupScene : public Flow2Graphics::VFlowScene, public NVX::VShare
 	Q_OBJECT
 	/// What a view of it begins with, by the keys of the scene's options.
 	Q_PROPERTY(QVariantMap viewOptions READ ViewOptions CONSTANT)
+	/// As the host wants it.
+	Q_PROPERTY(bool wheelInFixedViews READ WheelInFixedViews CONSTANT)
 
 public:
 	VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pGraphicsContext,
@@ -39,6 +41,15 @@ public:
 	~VRetargetSetupScene() override;
 
 	static QVariantMap ViewOptions();
+	bool WheelInFixedViews() const;
+
+	/// All segments of both subjects.
+	std::vector<NVX::ISelectionItem> ItemsToFrame() const override;
+
+	/// Which side of the target subject a fixed view shows: "front", "back", "left side" or "right side". Empty for the
+	/// other views, and where the names of the segments do not tell the sides.
+	/// @param i_CameraType CoreGraphics::ECameraType
+	Q_INVOKABLE QString SideSeen(int i_CameraType) const;
 
 	/// Shows what the document has now.
 	void RefreshScene();
@@ -59,6 +70,12 @@ public:
 	/// The frame in the world in which a segment's joint turns. The segment must be there.
 	void ComputeJointFrame(
 	    QMatrix4x4& o_rMatrix, const CoreOrlexTypes::VSubject& i_rSubject, std::size_t i_SegmentIndex) const;
+
+signals:
+	/// Performer or character is shown, and there was none before. Where it stands is known with the next frame.
+	void subjectAppeared();
+	/// Where the segments stand in the last frame can be read.
+	void framePublished();
 
 protected:
 	void OnShared() override;
@@ -90,6 +107,8 @@ private:
 	/// What the selection is of.
 	std::string m_SelectedSource;
 	std::uint64_t m_SelectedSubject = 0;
+	bool m_bShowsSource = false;
+	bool m_bShowsTarget = false;
 	bool m_bConnected = false;
 	/// -1 while the manipulator is hidden.
 	std::int64_t m_ManipulatedSegment = -1;

@@ -217,9 +217,13 @@ void VCameraController::Move(const QPoint& i_rMouse)
 	}
 }
 
-void VCameraController::Wheel(int i_Delta)
+void VCameraController::Wheel(int i_Delta, bool i_bInFixedViews)
 {
-	SetDistance(m_Distance * (i_Delta < 0 ? 1.1f : 0.9f));
+	const float factor = i_Delta < 0 ? 1.1f : 0.9f;
+	if (!IsOrthographic() || !i_bInFixedViews)
+		return SetDistance(m_Distance * factor);
+	SetScale(m_OrthographicScale * factor);
+	UpdateProjection();
 }
 
 void VCameraController::Apply(VRenderContext& io_rContext) const

@@ -85,7 +85,8 @@ public:
 	/// A button went up. @param i_Buttons those that are still held
 	void Release(std::uint32_t i_Buttons, std::uint32_t i_Modifiers);
 	/// Of the mouse wheel; away from the user is positive.
-	void Wheel(int i_Delta);
+	/// @param i_bInFixedViews orthographic views go nearer and farther, too, and keep the distance of the other one
+	void Wheel(int i_Delta, bool i_bInFixedViews = false);
 
 	/// Hands matrices, viewport and frame size to the context.
 	void Apply(VRenderContext& io_rContext) const;

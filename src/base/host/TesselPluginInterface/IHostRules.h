@@ -25,6 +25,8 @@ struct VHostRules
 	/// A segment whose name differs from its partner's in more than the rule for names knows finds it by words for
 	/// sides anywhere in the names, or by its place.
 	bool m_bPartnersBySides = false;
+	/// The wheel of the mouse goes nearer and farther in the fixed views of the preview, too.
+	bool m_bWheelInFixedViews = false;
 };
 
 /// What a host may give beyond the services that every host gives: the application object of such a host implements

@@ -56,6 +56,7 @@ ColumnLayout {
 			scene: FlowScene
 			focusSelection: FocusSelection
 			cameraType: cameraTypes.currentIndex
+			wheelInFixedViews: FlowScene.wheelInFixedViews
 			Accessible.role: Accessible.Graphic
 			Accessible.name: "Preview"
 
@@ -63,15 +64,53 @@ ColumnLayout {
 				const options = FlowScene.viewOptions
 				for (const key in options)
 					sceneOptions[key] = options[key]
+				FrameAll()
+			}
+		}
+		Connections {
+			target: FlowScene
+			function onSubjectAppeared() {
+				sceneFBO.FrameAll()
+			}
+			function onFramePublished() {
+				sideSeen.update()
 			}
 		}
 
-		RetargetSetupViewFilters {
-			objectName: "filters"
+		RetargetSetupViewGround {
 			visible: viewFilters.checked
 			x: Theme.margin
 			y: Theme.margin
-			options: sceneFBO.sceneOptions
+
+			RetargetSetupViewFilters {
+				objectName: "filters"
+				options: sceneFBO.sceneOptions
+			}
+		}
+
+		// A fixed view is named for the stage, and the character may face any way on it.
+		RetargetSetupViewGround {
+			visible: sideSeen.text !== ""
+			anchors {
+				right: parent.right
+				top: parent.top
+				margins: Theme.margin
+			}
+
+			OrlexLabel {
+				id: sideSeen
+
+				readonly property int cameraType: cameraTypes.currentIndex
+
+				objectName: "sideSeen"
+				color: Theme.windowText
+				onCameraTypeChanged: update()
+
+				function update() {
+					const side = FlowScene.SideSeen(cameraType)
+					text = side === "" ? "" : "The character's " + side
+				}
+			}
 		}
 
 		// The axes stand beside it.

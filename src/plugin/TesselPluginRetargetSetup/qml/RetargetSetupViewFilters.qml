@@ -7,21 +7,24 @@ Column {
 
 	// Of the scene.
 	property var options: null
+	readonly property real indent: 10
+
+	rightPadding: indent
 
 	Repeater {
 		model: [
-			{ text: "Constraints", option: "SolvingSubject-Targets", other: "", indent: 0 },
-			{ text: "Joints", option: "LabellingSubject-Joints", other: "SolvingSubject-Joints", indent: 0 },
-			{ text: "Segment Axes", option: "LabellingSubject-Axes", other: "SolvingSubject-Axes", indent: 0 },
-			{ text: "Source Skin", option: "LabellingSubject-Skin", other: "", indent: 0 },
-			{ text: "Source Skin X-Ray", option: "LabellingSubject-SkinXRay", other: "", indent: 10 },
-			{ text: "Target Skin", option: "SolvingSubject-Skin", other: "", indent: 0 },
-			{ text: "Target Skin X-Ray", option: "SolvingSubject-SkinXRay", other: "", indent: 10 }
+			{ text: "Constraints", option: "SolvingSubject-Targets", other: "", indented: false },
+			{ text: "Joints", option: "LabellingSubject-Joints", other: "SolvingSubject-Joints", indented: false },
+			{ text: "Segment Axes", option: "LabellingSubject-Axes", other: "SolvingSubject-Axes", indented: false },
+			{ text: "Source Skin", option: "LabellingSubject-Skin", other: "", indented: false },
+			{ text: "Source Skin X-Ray", option: "LabellingSubject-SkinXRay", other: "", indented: true },
+			{ text: "Target Skin", option: "SolvingSubject-Skin", other: "", indented: false },
+			{ text: "Target Skin X-Ray", option: "SolvingSubject-SkinXRay", other: "", indented: true }
 		]
 
 		PropertyCheckBox {
 			objectName: "filter" + modelData.text.replace(/[ -]/g, "")
-			x: modelData.indent
+			x: modelData.indented ? filters.indent : 0
 			text: modelData.text
 			target: filters.options
 			property: modelData.option

@@ -63,6 +63,8 @@ public:
 
 	/// Bounding spheres of items, as centre and radius, as the last frame placed them.
 	virtual std::vector<QVector4D> GetBounds(const std::vector<NVX::ISelectionItem>& i_rSelection) const;
+	/// What a view shows in which nothing is selected. Where both threads meet.
+	virtual std::vector<NVX::ISelectionItem> ItemsToFrame() const { return {}; }
 	/// False for no item and for one without a matrix in the last frame.
 	virtual bool GetItemTransform(const std::vector<NVX::ISelectionItem>& i_rSelection, QMatrix4x4& o_rTransform) const;
 	/// The items of picked ids, on the render thread.

@@ -143,7 +143,13 @@ void VSceneFramebufferObject::SetFocusSelection(bool i_bFocusSelection)
 {
 	if (!i_bFocusSelection)
 		return;
-	m_bFitPending = true;
+	m_Fit = EFit::Selection;
+	update();
+}
+
+void VSceneFramebufferObject::FrameAll()
+{
+	m_Fit = EFit::All;
 	update();
 }
 

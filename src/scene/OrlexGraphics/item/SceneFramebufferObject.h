@@ -43,6 +43,15 @@ enum EMouseState : std::uint32_t
 	EMouseDragged
 };
 
+/// What is to be framed with the next exchange.
+enum class EFit : std::uint32_t
+{
+	None,
+	/// All, if nothing is selected.
+	Selection,
+	All
+};
+
 /// The preview: shows a scene in a Qt Quick window, moves its camera, and finds what the mouse points at. All of it
 /// runs on the user interface thread, but for the functions that are named as the renderer's: those are called while
 /// that thread waits.
@@ -63,8 +72,10 @@ class VSceneFramebufferObject : public QQuickFramebufferObject
 	    bool showCameraNumbers READ GetShowCameraNumbers WRITE SetShowCameraNumbers NOTIFY ShowCameraNumbersChanged)
 	Q_PROPERTY(QList<QObject*> cameraObjects READ GetCameraObjects NOTIFY CamerasChanged)
 	Q_PROPERTY(QList<QObject*> subjectObjects READ GetSubjectObjects WRITE SetSubjectObjects NOTIFY SubjectsChanged)
-	/// Setting it to true frames the selection.
+	/// Setting it to true frames the selection, or all that the scene names for it where nothing is selected.
 	Q_PROPERTY(bool focusSelection READ GetFocusSelection WRITE SetFocusSelection)
+	/// The wheel goes nearer and farther in the fixed views, too.
+	Q_PROPERTY(bool wheelInFixedViews MEMBER m_bWheelInFixedViews)
 	Q_PROPERTY(OrlexGraphics::ETracking tracking READ GetTracking WRITE SetTracking NOTIFY TrackSelectionChanged)
 
 public:
@@ -98,6 +109,9 @@ public:
 	const VSceneOptions& Options() const { return m_Options; }
 	EMouseState MouseState() const { return m_MouseState; }
 	CoreGraphics::VCameraController& Camera() const { return *m_pCamera; }
+
+	/// Frames all that the scene names for it, in the free view and in the fixed ones.
+	Q_INVOKABLE void FrameAll();
 
 	/// Makes the manipulator larger or smaller, within its limits, and tells the option map.
 	Q_INVOKABLE void ScaleManipulator(double i_Factor);
@@ -178,7 +192,8 @@ private:
 	QList<QObject*> m_SubjectObjects;
 	ETracking m_Tracking = ETrackingNone;
 	bool m_bTrackSelectionPending = false;
-	bool m_bFitPending = false;
+	EFit m_Fit = EFit::None;
+	bool m_bWheelInFixedViews = false;
 	NVX::VConnection m_FrameConnection;
 	NVX::VConnection m_PublishedConnection;
 };

@@ -151,7 +151,7 @@ void VSceneFramebufferObject::wheelEvent(QWheelEvent* io_pEvent)
 	// Sideways only.
 	if (io_pEvent->angleDelta().y() == 0)
 		return;
-	m_pCamera->Wheel(io_pEvent->angleDelta().y());
+	m_pCamera->Wheel(io_pEvent->angleDelta().y(), m_bWheelInFixedViews);
 	OnFrameChanged();
 	update();
 }

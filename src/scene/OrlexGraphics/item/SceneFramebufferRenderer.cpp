@@ -8,6 +8,7 @@
 #include <QQuickWindow>
 
 #include <atomic>
+#include <utility>
 
 namespace OrlexGraphics
 {
@@ -60,6 +61,26 @@ void VSceneFramebufferRenderer::TakeScene(VSceneFramebufferObject& io_rItem)
 		m_Renderer.Scene()->Synchronise();
 }
 
+void VSceneFramebufferRenderer::Fit(
+    const VOrlexScene& i_rScene, EFit i_Fit, CoreGraphics::VCameraController& io_rCamera)
+{
+	if (i_Fit == EFit::None)
+		return;
+	std::vector<QVector4D> bounds;
+	if (i_Fit == EFit::Selection && i_rScene.SelectionManager())
+		bounds = i_rScene.GetBounds(i_rScene.SelectionManager()->Selection().Items());
+	if (bounds.empty())
+		bounds = i_rScene.GetBounds(i_rScene.ItemsToFrame());
+	const std::uint32_t shown = io_rCamera.m_Type;
+	if (i_Fit == EFit::All)
+	{
+		io_rCamera.m_Type = io_rCamera.IsOrthographic() ? CoreGraphics::ECameraPerspective : CoreGraphics::ECameraFront;
+		io_rCamera.Fit(bounds, true);
+		io_rCamera.m_Type = shown;
+	}
+	io_rCamera.Fit(bounds, true);
+}
+
 void VSceneFramebufferRenderer::Track(VSceneFramebufferObject& io_rItem)
 {
 	CoreGraphics::VCameraController& rCamera = *io_rItem.m_pCamera;
@@ -83,11 +104,8 @@ void VSceneFramebufferRenderer::Track(VSceneFramebufferObject& io_rItem)
 		else if (m_Tracking == ETrackingTransform && pScene->GetItemTransform(m_Tracked, transform))
 			rCamera.m_FrameOfReference = transform;
 		// The bounds of a frame that is still to be drawn come with the exchange after it.
-		if (io_rItem.m_bFitPending && !pScene->NeedsRefresh())
-		{
-			rCamera.Fit(pScene->GetBounds(rSelected), true);
-			io_rItem.m_bFitPending = false;
-		}
+		if (!pScene->NeedsRefresh())
+			Fit(*pScene, std::exchange(io_rItem.m_Fit, EFit::None), rCamera);
 	}
 	io_rItem.m_bTrackSelectionPending = false;
 
@@ -134,7 +152,7 @@ void VSceneFramebufferRenderer::synchronize(QQuickFramebufferObject* io_pItem)
 	// Only the item's own update leads to another exchange.
 	const bool bOutstanding = m_bPickActive
 	    && (state == EMouseClicked || state == EMouseDragged || !m_Pick || m_Pick->m_Request != m_Request);
-	if (m_bVisible && (m_bContinuousUpdate || bOutstanding || (rItem.m_bFitPending && pScene)))
+	if (m_bVisible && (m_bContinuousUpdate || bOutstanding || (rItem.m_Fit != EFit::None && pScene)))
 		QMetaObject::invokeMethod(&rItem, &QQuickItem::update, Qt::QueuedConnection);
 }
 

@@ -16,6 +16,7 @@ namespace OrlexGraphics
 {
 
 class VSceneFramebufferObject;
+enum class EFit : std::uint32_t;
 
 /// Draws the scene of one SceneFramebufferObject, on the render thread, and picks from it. It owns the OpenGL objects
 /// of the view and lives as long as they do.
@@ -36,6 +37,7 @@ public:
 
 private:
 	void TakeScene(VSceneFramebufferObject& io_rItem);
+	static void Fit(const VOrlexScene& i_rScene, EFit i_Fit, CoreGraphics::VCameraController& io_rCamera);
 	void Track(VSceneFramebufferObject& io_rItem);
 
 	VFrameRenderer m_Renderer;
