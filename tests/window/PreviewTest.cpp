@@ -324,6 +324,19 @@ TEST_F(Preview, TheRootMovesAlongAnArrow)
 	const QPoint to = from + QPoint(50, 30);
 	m_pOperator->Point(from);
 	EXPECT_EVENTUALLY(Sees(from, IsYellow));
+	// One that Escape ends, whatever the mouse does after it.
+	const bool bUnsaved = m_pOperator->Property("unsavedMark", "visible").toBool();
+	m_pOperator->Press(Qt::LeftButton, from);
+	m_pOperator->Point(from + QPoint(20, 0));
+	m_pOperator->Point(to);
+	m_pOperator->Key(Qt::Key_Escape);
+	m_pOperator->Point(from + QPoint(0, 40));
+	m_pOperator->Release(Qt::LeftButton, from + QPoint(0, 40));
+	EXPECT_TRUE(Selected("targetSegments", "haunch"));
+	EXPECT_EQ(m_pOperator->Property("unsavedMark", "visible").toBool(), bUnsaved);
+	EXPECT_TRUE(SaveAs("as before.qrr") == m_Created);
+	m_pOperator->Point(from);
+	EXPECT_EVENTUALLY(Sees(from, IsYellow));
 	m_pOperator->Drag({Qt::LeftButton}, from, to);
 
 	// How far along the arrow the mouse is: where it comes nearest to it.
@@ -410,6 +423,14 @@ TEST_F(Preview, SelectsLikeTheLists)
 		rOperator.Point(shins.bottomRight(), modifiers);
 		EXPECT_EVENTUALLY(ToolTip() == "Template : R_Tibia<br>Template : shinRight") << ToolTip().toStdString();
 		EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "Template : R_Tibia\nTemplate : shinRight"));
+		EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
+		const QStringList before = Selected();
+		rOperator.Key(Qt::Key_Escape);
+		EXPECT_EVENTUALLY(!Sees(shins.topLeft(), IsOrange));
+		rOperator.Release(Qt::LeftButton, shins.bottomRight(), modifiers);
+		EXPECT_EQ(Selected(), before);
+		rOperator.Press(Qt::LeftButton, shins.topLeft(), modifiers);
+		rOperator.Point(shins.bottomRight(), modifiers);
 		EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
 		rOperator.Release(Qt::LeftButton, shins.bottomRight(), modifiers);
 		EXPECT_EVENTUALLY(

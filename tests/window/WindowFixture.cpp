@@ -27,7 +27,9 @@ void Window::SetUp()
 	StudioHost::CheckOpenGL();
 	// Each blink of a text cursor would draw the whole panel.
 	if (qEnvironmentVariableIsSet("LIBGL_ALWAYS_SOFTWARE"))
+	{
 		ASSERT_EQ(QGuiApplication::styleHints()->cursorFlashTime(), 0);
+	}
 	const std::string folder = m_Folder.path().toStdString();
 	QFile::copy(RETARGET_SOURCE "/demo/performer.qrs", m_Folder.filePath("performer.qrs"));
 	QFile::copy(RETARGET_SOURCE "/demo/character.fbx", m_Folder.filePath("character.fbx"));

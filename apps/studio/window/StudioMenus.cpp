@@ -234,6 +234,7 @@ void VStudioWindow::ShowMouseAndKeys()
 	        tr("turns the selected target segment: with Ctrl by steps of 45 degrees, with Shift "
 	           "finely")},
 	    {tr("an arrow or a square corner, dragged"), tr("moves the root of the target subject")},
+	    {tr("Esc"), tr("ends a drag of the manipulator or a rectangle as if it had not begun")},
 	    {tr("Ctrl++ and Ctrl+-"), tr("make the manipulator larger and smaller")},
 	    {tr("Alt+T and Alt+R"), tr("add a position and a rotation target")}};
 	QString text = tr("<b>In the preview</b>") + QStringLiteral("<table cellpadding='3'>");

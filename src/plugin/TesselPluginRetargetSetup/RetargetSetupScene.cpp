@@ -66,11 +66,6 @@ QVariantMap VRetargetSetupScene::ViewOptions()
 	};
 }
 
-bool VRetargetSetupScene::WheelInFixedViews() const
-{
-	return m_pRetargetSetup->HostRules().m_bWheelInFixedViews;
-}
-
 std::vector<ISelectionItem> VRetargetSetupScene::ItemsToFrame() const
 {
 	std::vector<ISelectionItem> items;
@@ -176,6 +171,7 @@ void VRetargetSetupScene::InitialiseGL()
 	{
 		RenderManipulator()->BeginSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorPressed));
 		RenderManipulator()->ChangedSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorMoved));
+		RenderManipulator()->CancelSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorCancelled));
 	}
 	Dispatcher()->Post(
 	    [pWeak = weak_from_this()]
@@ -222,6 +218,8 @@ void VRetargetSetupScene::UpdateManipulator()
 void VRetargetSetupScene::OnManipulatorPressed()
 {
 	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
+	m_pPressed = pSubject;
+	m_PressedSubject = m_pRetargetSetup->TargetSubjectIdentity();
 	if (!pSubject || std::size_t(m_ManipulatedSegment) >= pSubject->m_Segments.size())
 		return;
 	const VSubjectParametrised::VSegment& rSegment = pSubject->m_Segments[std::size_t(m_ManipulatedSegment)];
@@ -234,6 +232,28 @@ void VRetargetSetupScene::OnManipulatorPressed()
 		NVX_LOG("RetargetSetup", NVX::ELogWarning,
 		    "The segment '%1%' does not follow the manipulator exactly: its joint is not a plain ball joint",
 		    rSegment.m_Name);
+}
+
+void VRetargetSetupScene::OnManipulatorCancelled()
+{
+	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
+	const auto pPressed = std::exchange(m_pPressed, nullptr);
+	if (!pSubject || !pPressed || m_PressedSubject != m_pRetargetSetup->TargetSubjectIdentity()
+	    || pSubject->m_Segments.size() != pPressed->m_Segments.size())
+		return;
+	// What else was edited since stays.
+	VSubjectParametrised subject = *pSubject;
+	for (std::size_t i = 0; i < subject.m_Segments.size(); ++i)
+	{
+		const VSubjectParametrised::VJoint& rPressed = pPressed->m_Segments[i].m_Joint;
+		VSubjectParametrised::VJoint& rJoint = subject.m_Segments[i].m_Joint;
+		if (rJoint.m_JointType != rPressed.m_JointType)
+			continue;
+		rJoint.m_BindPose = rPressed.m_BindPose;
+		rJoint.m_Mean = rPressed.m_Mean;
+	}
+	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject));
+	RefreshScene();
 }
 
 void VRetargetSetupScene::ComputeJointFrame(

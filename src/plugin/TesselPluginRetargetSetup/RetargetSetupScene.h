@@ -29,8 +29,6 @@ class VRetargetSetupScene : public Flow2Graphics::VFlowScene, public NVX::VShare
 	Q_OBJECT
 	/// What a view of it begins with, by the keys of the scene's options.
 	Q_PROPERTY(QVariantMap viewOptions READ ViewOptions CONSTANT)
-	/// As the host wants it.
-	Q_PROPERTY(bool wheelInFixedViews READ WheelInFixedViews CONSTANT)
 
 public:
 	VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pGraphicsContext,
@@ -41,7 +39,6 @@ public:
 	~VRetargetSetupScene() override;
 
 	static QVariantMap ViewOptions();
-	bool WheelInFixedViews() const;
 
 	/// All segments of both subjects.
 	std::vector<NVX::ISelectionItem> ItemsToFrame() const override;
@@ -85,8 +82,10 @@ private:
 	/// Shows the manipulator where the selected target segment stands in the last frame, or hides it. Not while it is
 	/// dragged.
 	void UpdateManipulator();
-	/// Tells of joints that cannot take the pose of the manipulator as it is.
+	/// Keeps the pose, and tells of joints that cannot take the manipulator's as it is.
 	void OnManipulatorPressed();
+	/// The pose is what it was at the press.
+	void OnManipulatorCancelled();
 	/// Whether the segment on the other side takes over the change of a pose rather than the pose: where the host's
 	/// rules want it, and the two are no mirror images of each other at rest. Told once for a character.
 	bool MirrorsChange(std::size_t i_SegmentIndex, std::size_t i_MirrorIndex);
@@ -110,6 +109,9 @@ private:
 	bool m_bShowsSource = false;
 	bool m_bShowsTarget = false;
 	bool m_bConnected = false;
+	/// At the last press, and the number of its subject.
+	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pPressed;
+	std::uint64_t m_PressedSubject = 0;
 	/// -1 while the manipulator is hidden.
 	std::int64_t m_ManipulatedSegment = -1;
 	VMirrorRule m_MirrorRule;

@@ -91,6 +91,8 @@ VRetargetSetupWidget::~VRetargetSetupWidget()
 void VRetargetSetupWidget::FindScene()
 {
 	m_pSceneItem = rootObject() ? rootObject()->findChild<OrlexGraphics::VSceneFramebufferObject*>() : nullptr;
+	if (m_pSceneItem)
+		m_pSceneItem->SetWheelInFixedViews(m_pRetargetSetup->HostRules().m_bWheelInFixedViews);
 }
 
 bool VRetargetSetupWidget::IsThere(const QUrl& i_rFileURL) const

@@ -56,7 +56,6 @@ ColumnLayout {
 			scene: FlowScene
 			focusSelection: FocusSelection
 			cameraType: cameraTypes.currentIndex
-			wheelInFixedViews: FlowScene.wheelInFixedViews
 			Accessible.role: Accessible.Graphic
 			Accessible.name: "Preview"
 

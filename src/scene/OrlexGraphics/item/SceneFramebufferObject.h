@@ -74,8 +74,6 @@ class VSceneFramebufferObject : public QQuickFramebufferObject
 	Q_PROPERTY(QList<QObject*> subjectObjects READ GetSubjectObjects WRITE SetSubjectObjects NOTIFY SubjectsChanged)
 	/// Setting it to true frames the selection, or all that the scene names for it where nothing is selected.
 	Q_PROPERTY(bool focusSelection READ GetFocusSelection WRITE SetFocusSelection)
-	/// The wheel goes nearer and farther in the fixed views, too.
-	Q_PROPERTY(bool wheelInFixedViews MEMBER m_bWheelInFixedViews)
 	Q_PROPERTY(OrlexGraphics::ETracking tracking READ GetTracking WRITE SetTracking NOTIFY TrackSelectionChanged)
 
 public:
@@ -109,6 +107,9 @@ public:
 	const VSceneOptions& Options() const { return m_Options; }
 	EMouseState MouseState() const { return m_MouseState; }
 	CoreGraphics::VCameraController& Camera() const { return *m_pCamera; }
+
+	/// The wheel goes nearer and farther in the fixed views, too.
+	void SetWheelInFixedViews(bool i_bWheel) { m_bWheelInFixedViews = i_bWheel; }
 
 	/// Frames all that the scene names for it, in the free view and in the fixed ones.
 	Q_INVOKABLE void FrameAll();
@@ -152,6 +153,8 @@ private:
 	/// Places the labels of cameras and subjects over the view.
 	void OnFrameChanged();
 	void SetModifiers(Qt::KeyboardModifiers i_Modifiers);
+	/// Ends a drag of a manipulator, or a rectangle, as if it had not begun. False if there is none.
+	bool CancelDrag();
 	/// Nothing is pointed at.
 	void ClearPreview();
 	/// The manipulator that a condition holds for, null if there is none.

@@ -159,8 +159,22 @@ void VSceneFramebufferObject::wheelEvent(QWheelEvent* io_pEvent)
 void VSceneFramebufferObject::keyPressEvent(QKeyEvent* io_pEvent)
 {
 	SetModifiers(io_pEvent->modifiers());
-	io_pEvent->ignore();
+	io_pEvent->setAccepted(io_pEvent->key() == Qt::Key_Escape && CancelDrag());
 	update();
+}
+
+bool VSceneFramebufferObject::CancelDrag()
+{
+	if (IManipulator* const pManipulator = FindManipulator(&IManipulator::IsDragging))
+	{
+		pManipulator->Cancel();
+		return true;
+	}
+	if (m_MouseState != EMouseDragging)
+		return false;
+	m_MouseState = EMouseIdle;
+	ClearPreview();
+	return true;
 }
 
 void VSceneFramebufferObject::keyReleaseEvent(QKeyEvent* io_pEvent)

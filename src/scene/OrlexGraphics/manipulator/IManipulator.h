@@ -29,6 +29,8 @@ public:
 	virtual void Drag(
 	    const CoreGraphics::VCameraController& i_rCamera, const QPoint& i_Mouse, Qt::KeyboardModifiers i_Modifiers) = 0;
 	virtual void Release() = 0;
+	/// Ends a drag as if it had not begun.
+	virtual void Cancel() = 0;
 
 	/// Copies what the user interface thread has set to what the render thread draws, while the former waits.
 	virtual void Synchronise() = 0;

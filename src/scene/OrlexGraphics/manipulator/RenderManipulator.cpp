@@ -167,6 +167,15 @@ void VRenderManipulator::Release()
 	m_EndSignal.Fire();
 }
 
+void VRenderManipulator::Cancel()
+{
+	if (!m_Drag)
+		return;
+	m_State.m_Transform = m_GivenTransform;
+	m_CancelSignal.Fire();
+	Release();
+}
+
 void VRenderManipulator::Synchronise()
 {
 	m_Drawn = m_State;

@@ -60,6 +60,8 @@ public:
 
 	NVX::VSignal<>& BeginSignal() { return m_BeginSignal; }
 	NVX::VSignal<QMatrix4x4>& ChangedSignal() { return m_ChangedSignal; }
+	/// What ChangedSignal has changed since BeginSignal is to be as it was. EndSignal follows.
+	NVX::VSignal<>& CancelSignal() { return m_CancelSignal; }
 	NVX::VSignal<>& EndSignal() { return m_EndSignal; }
 
 	bool IsHovered() const override;
@@ -68,6 +70,7 @@ public:
 	void Drag(const CoreGraphics::VCameraController& i_rCamera, const QPoint& i_Mouse,
 	    Qt::KeyboardModifiers i_Modifiers) override;
 	void Release() override;
+	void Cancel() override;
 	void Synchronise() override;
 
 	// For the render thread.
@@ -99,6 +102,7 @@ private:
 	const std::shared_ptr<TesselPluginInterface::ISelectionManager> m_pSelectionManager;
 	NVX::VSignal<> m_BeginSignal;
 	NVX::VSignal<QMatrix4x4> m_ChangedSignal;
+	NVX::VSignal<> m_CancelSignal;
 	NVX::VSignal<> m_EndSignal;
 
 	// Of the user interface thread.

@@ -133,8 +133,10 @@ void VRenderVolumeManipulator::Press(const CoreGraphics::VCameraController& i_rC
 	if (!handle || IsDragging())
 		return;
 	m_Drag = VVolumeDrag::Press(i_rCamera, i_Mouse, *handle, m_State.m_Volume);
-	if (m_Drag)
-		m_pSelectionManager->Selection().Add({HandleItem(*handle)});
+	if (!m_Drag)
+		return;
+	m_Start = m_State.m_Volume;
+	m_pSelectionManager->Selection().Add({HandleItem(*handle)});
 }
 
 void VRenderVolumeManipulator::Drag(
@@ -154,6 +156,15 @@ void VRenderVolumeManipulator::Release()
 	const NVX::ISelectionItem item = HandleItem(m_Drag->Handle());
 	m_Drag.reset();
 	m_pSelectionManager->Selection().Remove({item});
+}
+
+void VRenderVolumeManipulator::Cancel()
+{
+	if (!m_Drag)
+		return;
+	m_State.m_Volume = m_Start;
+	m_ChangedSignal.Fire(m_Start.m_Minimum, m_Start.m_Maximum);
+	Release();
 }
 
 void VRenderVolumeManipulator::Synchronise()

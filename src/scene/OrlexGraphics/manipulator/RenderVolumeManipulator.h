@@ -62,6 +62,7 @@ public:
 	void Drag(const CoreGraphics::VCameraController& i_rCamera, const QPoint& i_Mouse,
 	    Qt::KeyboardModifiers i_Modifiers) override;
 	void Release() override;
+	void Cancel() override;
 	void Synchronise() override;
 
 	// For the render thread.
@@ -108,6 +109,8 @@ private:
 	// Of the user interface thread.
 	VState m_State;
 	std::optional<VVolumeDrag> m_Drag;
+	/// Before the drag.
+	VVolume m_Start;
 
 	// Of the render thread.
 	VState m_Drawn;
