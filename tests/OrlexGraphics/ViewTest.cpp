@@ -341,6 +341,8 @@ TEST_F(VViewTest, EndsItsRenderersWithTheirWindows)
 	// A dock is another window, with another context.
 	const auto dock = [&](auto& io_rView, auto& io_rDock)
 	{
+		// A window that is shown is the window manager's, which would take it out of its new parent.
+		io_rView.hide();
 		io_rView.setParent(&io_rDock);
 		m_pScene->RequestRefresh();
 		io_rDock.resize(c_Width, c_Height);
@@ -348,6 +350,7 @@ TEST_F(VViewTest, EndsItsRenderersWithTheirWindows)
 		io_rView.show();
 		io_rDock.show();
 		EXPECT_TRUE(Until(isSelected));
+		io_rView.hide();
 		io_rView.setParent(static_cast<decltype(&io_rDock)>(nullptr));
 		io_rView.show();
 		EXPECT_TRUE(Until(isSelected));
