@@ -340,6 +340,17 @@ TEST_F(Handlers, AFileThatGivesNothingIsToldWhileItIsChosen)
 	    std::string::npos);
 	Run();
 	EXPECT_EQ(m_pWidget->Remarks().toStdString(), "");
+
+	const auto& rBones = *m_pDocument->GetFBXSkeleton();
+	for (const std::uint32_t root : {1u, 0u})
+	{
+		Parameter("TargetRoot").SetValue(ToVariant(root));
+		Run();
+		EXPECT_EQ(m_pWidget->Remarks().toStdString(),
+		    root == 0 ? ""
+		              : "The target subject begins at " + rBones[0].m_Name + ". The root above, " + rBones[1].m_Name
+		            + ", is for the next \"Create Target Subject\".");
+	}
 }
 
 TEST_F(Handlers, AnFBXFileThatChangesOnDiskIsReadAgain)
@@ -427,6 +438,12 @@ TEST_F(Handlers, TheSourceThatIsThereIsNotReadAgain)
 	Parameter("SourceSkin").SetValue(ToVariant(skin));
 	Run();
 	EXPECT_NE(m_pDocument->SourceValues().m_pParametrised, pBefore);
+	EXPECT_EQ(m_pDocument->SourceValues().m_pApplicationData->m_Skin, "OrlexA");
+	TakeLog();
+	Parameter("SourceSkeleton").SetValue(ToVariant(Copy(c_DemoSource, "subjects/anna.qrs").string()));
+	Run();
+	EXPECT_NE(TakeLog().find("The skin 'OrlexA' was chosen for source 'performer', and 'anna' wears it now"),
+	    std::string::npos);
 	EXPECT_EQ(m_pDocument->SourceValues().m_pApplicationData->m_Skin, "OrlexA");
 }
 

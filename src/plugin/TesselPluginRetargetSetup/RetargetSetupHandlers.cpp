@@ -9,6 +9,7 @@
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/RetargetSetupSelection.h"
+#include "RetargetSetupDocument/TargetConstruction.h"
 #include "TesselParameters/Parameter.h"
 #include "TesselParametersGUI/ParameterFBX.h"
 #include "TesselPluginInterface/IPreferenceFolders.h"
@@ -206,6 +207,7 @@ void VRetargetSetupWidget::OnTargetRootChanged()
 		return;
 	m_AgreedRoot = root;
 	m_pRetargetSetup->SetTargetRootIndex(root);
+	UpdateRemarks();
 }
 
 void VRetargetSetupWidget::OnTargetScaleChanged()
@@ -304,6 +306,19 @@ void VRetargetSetupWidget::UpdateRemarks()
 		remarks << tr(
 		    "The target subject is of %1. FBX and root above are of %2, for the next \"Create Target Subject\".")
 		               .arg(pData->m_Skin.empty() ? tr("an unknown character") : text(pData->m_Skin), made);
+	// Of one character, but begun at another bone.
+	const auto pSkeleton = m_pRetargetSetup->GetFBXSkeleton();
+	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
+	if (remarks.isEmpty() && pData && pSubject && !pSubject->m_Segments.empty() && pSkeleton && m_AgreedRoot
+	    && *m_AgreedRoot < pSkeleton->size())
+	{
+		const std::string& rBegins = pSubject->m_Segments.front().m_Name;
+		const std::string root(RetargetSetup::StripNamespace((*pSkeleton)[*m_AgreedRoot].m_Name));
+		if (rBegins != root)
+			remarks << tr(
+			    "The target subject begins at %1. The root above, %2, is for the next \"Create Target Subject\".")
+			               .arg(text(rBegins), text(root));
+	}
 	const QString joined = remarks.join('\n');
 	if (std::exchange(m_Remarks, joined) != joined)
 		emit remarksChanged();
