@@ -10,6 +10,7 @@
 #include "studio/panel/FileKind.h"
 
 #include <QAbstractItemModel>
+#include <QAction>
 #include <QFileInfo>
 #include <QQmlComponent>
 #include <QQuickItem>
@@ -40,14 +41,14 @@ constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubje
     {"UpdateTargets", "Update targets"}, {"RestoreTargetSubjectURL", "Restore"}};
 
 /// By objectName, of what can be seen.
-const QQuickItem* ItemNamed(const QQuickItem& i_rItem, const QString& i_rName)
+QQuickItem* ItemNamed(QQuickItem& i_rItem, const QString& i_rName)
 {
 	if (!i_rItem.isVisible())
 		return nullptr;
 	if (i_rItem.objectName() == i_rName)
 		return &i_rItem;
-	for (const QQuickItem* pChild : i_rItem.childItems())
-		if (const QQuickItem* const pFound = ItemNamed(*pChild, i_rName))
+	for (QQuickItem* pChild : i_rItem.childItems())
+		if (QQuickItem* const pFound = ItemNamed(*pChild, i_rName))
 			return pFound;
 	return nullptr;
 }
@@ -91,6 +92,7 @@ void VRetargetPanel::FollowRootItem()
 	m_pRoot = pRoot;
 	if (pRoot->metaObject()->indexOfProperty(c_pCurrentFile) >= 0)
 		connect(pRoot, SIGNAL(currentTargetSubjectURLChanged()), this, SIGNAL(stateChanged()));
+	MakeStartPage();
 	emit ready();
 }
 
@@ -128,8 +130,7 @@ QRectF VRetargetPanel::PlaceOf(EFileKind i_Kind) const
 	    : i_Kind == EFileKind::EFbx                        ? c_pFbx
 	    : i_Kind == EFileKind::ETarget                     ? "currentFile"
 	                                                       : nullptr;
-	const auto* const pRoot = qobject_cast<const QQuickItem*>(m_pRoot.data());
-	const QQuickItem* const pItem = pRoot && pName ? ItemNamed(*pRoot, QLatin1String(pName)) : nullptr;
+	const QQuickItem* const pItem = pName ? Item(pName) : nullptr;
 	return pItem ? pItem->mapRectToScene(pItem->boundingRect()) : QRectF();
 }
 
@@ -150,12 +151,73 @@ void VRetargetPanel::MarkDrop(const QStringList& i_rPaths)
 		if (const QRectF place = PlaceOf(kind); !place.isEmpty())
 			places << place;
 	}
-	// The panel lies over all widgets of the window, so what lies over the panel is part of its scene.
-	QQmlComponent component(pQuickWidget->engine(), QStringLiteral("qrc:/qml/Orlex/Controls/DropMark.qml"),
-	    QQmlComponent::PreferSynchronous);
-	m_pDropMark.reset(component.createWithInitialProperties(
+	m_pDropMark = MakeOverlay("DropMark.qml",
 	    {{"parent", QVariant::fromValue(pQuickWidget->quickWindow()->contentItem())}, {"text", lines.join('\n')},
-	        {"places", places}}));
+	        {"places", places}});
+}
+
+std::unique_ptr<QObject> VRetargetPanel::MakeOverlay(const char* i_pFile, const QVariantMap& i_rProperties) const
+{
+	// The panel lies over all widgets of the window, so what lies over the panel is part of its scene.
+	QQmlComponent component(static_cast<QQuickWidget*>(m_pWidget.data())->engine(),
+	    QStringLiteral("qrc:/qml/Orlex/Controls/") + QLatin1String(i_pFile), QQmlComponent::PreferSynchronous);
+	return std::unique_ptr<QObject>(component.createWithInitialProperties(i_rProperties));
+}
+
+QQuickItem* VRetargetPanel::Item(const char* i_pName) const
+{
+	auto* const pRoot = qobject_cast<QQuickItem*>(m_pRoot.data());
+	return pRoot ? ItemNamed(*pRoot, QLatin1String(i_pName)) : nullptr;
+}
+
+void VRetargetPanel::OfferToBegin(const QList<QAction*>& i_rActions)
+{
+	m_StartActions = i_rActions;
+	MakeStartPage();
+}
+
+void VRetargetPanel::MakeStartPage()
+{
+	m_pStartPage.reset();
+	QQuickItem* const pView = Item("scene");
+	if (!pView || m_StartActions.isEmpty())
+		return;
+	QStringList texts;
+	for (const QAction* const pAction : m_StartActions)
+		texts << pAction->text().remove('&');
+	m_pStartPage =
+	    MakeOverlay("StartPage.qml", {{"parent", QVariant::fromValue(pView->parentItem())}, {"texts", texts}});
+	connect(m_pStartPage.get(), SIGNAL(chosen(int)), this, SLOT(Begin(int)), Qt::QueuedConnection);
+	for (const char* const pName : {"SourceSegmentModel", "TargetSegmentModel"})
+		if (const QAbstractItemModel* const pModel = Model(pName))
+			connect(
+			    pModel, &QAbstractItemModel::modelReset, this, &VRetargetPanel::UpdateStartPage, Qt::UniqueConnection);
+	UpdateStartPage();
+}
+
+void VRetargetPanel::Begin(int i_Index)
+{
+	m_StartActions.value(i_Index)->trigger();
+}
+
+void VRetargetPanel::UpdateStartPage()
+{
+	const auto isEmpty = [this](const char* i_pName)
+	{
+		const QAbstractItemModel* const pModel = Model(i_pName);
+		return !pModel || pModel->rowCount() == 0;
+	};
+	if (m_pStartPage)
+		m_pStartPage->setProperty("visible", isEmpty("SourceSegmentModel") && isEmpty("TargetSegmentModel"));
+}
+
+void VRetargetPanel::FocusFirstField()
+{
+	if (QQuickItem* const pField = Item(c_pSource))
+	{
+		m_pWidget->setFocus();
+		pField->forceActiveFocus();
+	}
 }
 
 std::shared_ptr<TesselPluginInterface::IParameter> VRetargetPanel::Parameter(const char* i_pName) const

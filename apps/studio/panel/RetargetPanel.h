@@ -2,6 +2,7 @@
 
 #include "NVX/SelectionItemVariant.h"
 
+#include <QList>
 #include <QObject>
 #include <QPointer>
 #include <QRectF>
@@ -13,6 +14,8 @@
 #include <vector>
 
 class QAbstractItemModel;
+class QAction;
+class QQuickItem;
 class QWidget;
 
 namespace TesselPluginInterface
@@ -44,6 +47,13 @@ public:
 
 	/// Shows over the panel what files are opened as, and at which of its fields. Nothing for an empty list.
 	void MarkDrop(const QStringList& i_rPaths);
+
+	/// A view without subjects shows a button for each of these; the last one is for what the lists of files offer.
+	/// They must outlive the panel.
+	void OfferToBegin(const QList<QAction*>& i_rActions);
+
+	/// The keyboard goes to what a job begins with.
+	void FocusFirstField();
 
 	/// Saves the target subject to its file; the panel asks for one if there is none.
 	void Save();
@@ -103,12 +113,18 @@ private:
 	std::shared_ptr<TesselPluginInterface::IParameter> Parameter(const char* i_pName) const;
 	bool SetParameter(const char* i_pName, const QString& i_rPath);
 	void FollowRootItem();
+	void MakeStartPage();
+	/// An item of its QML that can be seen, by objectName; null if there is none.
+	QQuickItem* Item(const char* i_pName) const;
+	std::unique_ptr<QObject> MakeOverlay(const char* i_pFile, const QVariantMap& i_rProperties) const;
 	/// A list that the panel shows to its QML; null if there is none.
 	const QAbstractItemModel* Model(const char* i_pName) const;
 	/// Where a file of this kind stands, in pixels of the panel; empty for nowhere.
 	QRectF PlaceOf(EFileKind i_Kind) const;
 
 private slots:
+	void Begin(int i_Index);
+	void UpdateStartPage();
 	void TellIgnored(const QString& i_rCommand, const QString& i_rReason);
 	void TellUsed(const QUrl& i_rUrl);
 
@@ -118,6 +134,8 @@ private:
 	const std::shared_ptr<TesselPluginInterface::IParameterRegistry> m_pParameters;
 	QPointer<QObject> m_pRoot;
 	std::unique_ptr<QObject> m_pDropMark;
+	QList<QAction*> m_StartActions;
+	std::unique_ptr<QObject> m_pStartPage;
 };
 
 } // namespace StudioHost

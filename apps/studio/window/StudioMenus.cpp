@@ -159,6 +159,14 @@ void VStudioWindow::MakeHelpMenu()
 	AddAction(rMenu, "About", tr("&About"), {}, [this] { ShowAbout(); });
 }
 
+QList<QAction*> VStudioWindow::StartActions() const
+{
+	QList<QAction*> actions;
+	for (const VOpenRow& rRow : c_OpenRows)
+		actions << findChild<QAction*>(QLatin1String(rRow.m_pName));
+	return actions << findChild<QAction*>(QStringLiteral("PreferencesAction"));
+}
+
 void VStudioWindow::AskAndOpen(int i_Kind)
 {
 	for (const VOpenRow& rRow : c_OpenRows)
@@ -228,6 +236,7 @@ void VStudioWindow::ShowMouseAndKeys()
 	    {tr("Ctrl+F"), tr("brings what is selected into the middle, or all where nothing is")},
 	    {tr("click"), tr("selects what is under the mouse, and nothing else")},
 	    {tr("Shift and click"), tr("adds it to what is selected")},
+	    {tr("right button, clicked"), tr("opens a menu for what is under the mouse")},
 	    {tr("Ctrl and click"), tr("adds it, or takes it away")}, {tr("Ctrl, Shift and click"), tr("takes it away")},
 	    {with(bAltSelects, tr("left button, dragged")), tr("selects all in a rectangle")},
 	    {tr("a ring, dragged"),

@@ -131,6 +131,7 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 		// Beside the settings, which are another user's or test's elsewhere.
 		m_pWorkKeeper = std::make_unique<VWorkKeeper>(*m_pRetargetPanel,
 		    QFileInfo(m_rSettings.fileName()).absoluteDir().filePath(QStringLiteral("unsaved-work")));
+		m_pRetargetPanel->OfferToBegin(StartActions());
 	}
 	UpdateTitle();
 	m_pNotice->setVisible(docks.isEmpty());
@@ -211,6 +212,8 @@ void VStudioWindow::ShowPreferences()
 void VStudioWindow::showEvent(QShowEvent* i_pEvent)
 {
 	QMainWindow::showEvent(i_pEvent);
+	if (m_pRetargetPanel)
+		m_pRetargetPanel->FocusFirstField();
 	// The layout has its size only now.
 	if (!std::exchange(m_bArranged, true))
 		QTimer::singleShot(0, this, [this] { resizeDocks({m_pLogDock}, {c_LogHeight}, Qt::Vertical); });

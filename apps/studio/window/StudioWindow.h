@@ -70,6 +70,8 @@ private:
 	QAction* AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText, const QKeySequence& i_rShortcut,
 	    std::function<void()> i_Run);
 	void AskAndOpen(int i_Kind);
+	/// Those that a job begins with, and the preferences.
+	QList<QAction*> StartActions() const;
 	/// @return empty if no file was chosen.
 	QString AskWhereToSave();
 	void UpdateRecentFiles();
