@@ -326,6 +326,9 @@ TEST_F(Panel, AddsAndRemovesTargetsOfTheSelection)
 	EXPECT_TRUE(Property("targetParameters", "enabled").toBool());
 	Click("removeTarget");
 	EXPECT_EQ(Target().m_Targets.size(), 1u);
+	EXPECT_EQ(m_pSelection->SelectedTarget(), 0) << "the one before it";
+	Click("removeTarget");
+	EXPECT_TRUE(Target().m_Targets.empty());
 	EXPECT_FALSE(Property("removeTarget", "enabled").toBool()) << "it was the last one";
 	EXPECT_FALSE(Property("targetParameters", "enabled").toBool());
 

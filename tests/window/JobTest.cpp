@@ -23,8 +23,12 @@ protected:
 TEST_F(Job, TheWholeJob)
 {
 	VOperator& rOperator = *m_pOperator;
-	rOperator.Choose("SourceSkeleton", "performer");
+	EXPECT_TRUE(rOperator.Property("SourceSkeleton", "activeFocus").toBool()) << "the first field";
+	EXPECT_TRUE(rOperator.Property("startPage", "visible").toBool());
+	rOperator.AnswerNextDialog(File("performer.qrs"));
+	rOperator.Click("start0");
 	EXPECT_EVENTUALLY(rOperator.Property("sourceSegments", "count").toInt() > 20);
+	EXPECT_FALSE(rOperator.Property("startPage", "visible").toBool());
 	rOperator.Choose("TargetFBX", "character");
 	EXPECT_EVENTUALLY(rOperator.Property("TargetRoot", "currentText").toString() == "haunch");
 	rOperator.Choose("TargetRoot", "loin");
@@ -226,6 +230,39 @@ TEST_F(Job, SelectsWithMouseAndKeys)
 	EXPECT_EVENTUALLY(!rOperator.Property("jointSymmetry", "checked").toBool());
 	rOperator.Click("jointSymmetry");
 	EXPECT_EVENTUALLY(rOperator.Property("jointSymmetry", "checked").toBool());
+}
+
+TEST_F(Job, MenusActOnWhatTheyWereOpenedOn)
+{
+	VOperator& rOperator = *m_pOperator;
+	CreateTargetSubject();
+	const auto row = [this](const char* i_pList, const char* i_pName)
+	{ return QString(i_pList) + "Row" + QString::number(RowOf(i_pList, i_pName)); };
+	const auto choose = [&](const QString& i_rEntry)
+	{
+		const QString item = "menu" + QString(i_rEntry).remove(' ');
+		EXPECT_EVENTUALLY(rOperator.Shows(item, i_rEntry));
+		rOperator.Click(item);
+		EXPECT_EVENTUALLY(!rOperator.Shows(item, i_rEntry));
+	};
+	rOperator.ClickRow("sourceSegments", RowOf("sourceSegments", "L_Humerus"));
+	rOperator.Click(row("targetSegments", "loin"), {}, Qt::RightButton);
+	choose("Select partner");
+	EXPECT_EQ(rOperator.Property("status", "text").toString(), "loin has no partner on the other side.");
+	rOperator.ClickRow("targetSegments", RowOf("targetSegments", "upperArmRight"));
+	rOperator.Click(row("targetSegments", "upperArmRight"), {}, Qt::RightButton);
+	choose("Select partner");
+	EXPECT_EQ(rOperator.Property("targetSegments", "selectedIndex").toInt(), RowOf("targetSegments", "upperArmLeft"));
+	for (const char* const pEntry : {"Add position target", "Add rotation target"})
+	{
+		rOperator.Click(row("targetSegments", "upperArmLeft"), {}, Qt::RightButton);
+		choose(pEntry);
+	}
+	EXPECT_EQ(Targets(), 2);
+	rOperator.Click("targetsRow0", {}, Qt::RightButton);
+	choose("Remove target");
+	EXPECT_EQ(Targets(), 1);
+	EXPECT_TRUE(rOperator.Property("removeTarget", "enabled").toBool()) << "the one that took its place";
 }
 
 TEST_F(Job, ALegacyFileIsSavedUnderANewName)

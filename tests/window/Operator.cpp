@@ -73,7 +73,7 @@ void VOperator::WaitForDrawing() const
 	QObject::disconnect(connection);
 }
 
-void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers)
+void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers, Qt::MouseButton i_Button)
 {
 	QQuickItem* const pItem = Item(i_rName);
 	ASSERT_TRUE(pItem && pItem->isEnabled() && pItem->isVisible()) << i_rName.toStdString();
@@ -92,7 +92,7 @@ void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers)
 	ASSERT_TRUE(m_rPanel.rect().contains(place)) << i_rName.toStdString();
 	const QPoint inWindow = m_rPanel.mapTo(&m_rWindow, place);
 	QTest::mouseMove(m_rWindow.windowHandle(), inWindow);
-	QTest::mouseClick(m_rWindow.windowHandle(), Qt::LeftButton, i_Modifiers, inWindow);
+	QTest::mouseClick(m_rWindow.windowHandle(), i_Button, i_Modifiers, inWindow);
 	QTest::qWait(0);
 }
 
@@ -282,6 +282,21 @@ QWidget* VOperator::Dialog() const
 		if (pWidget->isVisible() && qobject_cast<QFileDialog*>(pWidget))
 			return pWidget;
 	return nullptr;
+}
+
+void VOperator::AnswerNextDialog(const QString& i_rPath)
+{
+	auto* const pTimer = new QTimer(&m_rWindow);
+	QObject::connect(pTimer, &QTimer::timeout, pTimer,
+	    [this, pTimer, i_rPath]
+	    {
+		    if (!Dialog())
+			    return;
+		    pTimer->deleteLater();
+		    pTimer->stop();
+		    AnswerDialog(i_rPath);
+	    });
+	pTimer->start(10);
 }
 
 void VOperator::AnswerDialog(const QString& i_rPath)

@@ -29,7 +29,8 @@ public:
 	QVariant Property(const QString& i_rName, const char* i_pProperty) const;
 
 	/// The mouse, in the middle of an item.
-	void Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
+	void Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier,
+	    Qt::MouseButton i_Button = Qt::LeftButton);
 	void Hover(const QString& i_rName);
 
 	/// The mouse in the preview, at a place in its pixels.
@@ -66,6 +67,8 @@ public:
 	/// Clicks on a row of a list or table by its number, after scrolling to it.
 	void ClickRow(const QString& i_rList, int i_Row, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
 
+	/// The same for one that keeps the program until it is answered, as soon as it opens.
+	void AnswerNextDialog(const QString& i_rPath);
 	/// In the file dialog that is open, or opens soon: types the path and presses Enter. A test failure if there is
 	/// none.
 	void AnswerDialog(const QString& i_rPath);

@@ -232,6 +232,10 @@ TEST_F(Preview, TheMainRoad)
 	EXPECT_EVENTUALLY(Targets() == 2);
 	m_Edits += {"--position", "R_Radius:foreArmRight", "--rotation", "R_Radius:foreArmRight"};
 
+	PointAtBone("R_Radius", "R_Hand");
+	EXPECT_EVENTUALLY(rOperator.Shows(
+	    "sceneToolTip", "performer : R_Radius\nPosition target of foreArmRight\nRotation target of foreArmRight"));
+
 	// The shoulder in the middle, and the ring about its third axis as a circle.
 	rOperator.ClickAt(PointAtBone("upperArmLeft", "foreArmLeft"));
 	EXPECT_EVENTUALLY(Selected("targetSegments", "upperArmLeft"));
@@ -395,7 +399,7 @@ TEST_F(Preview, SelectsLikeTheLists)
 
 	// What is pointed at in a list shines in the view, and the other way round.
 	const QPointF place = PointAtBone(target.first, target.second);
-	EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", ToolTip()));
+	EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "character : foreArmRight"));
 	rOperator.Press(Qt::LeftButton, place);
 	rOperator.Point(place + QPointF(20.0, 0.0));
 	EXPECT_EQ(ToolTip(), "") << "the camera moves";
@@ -422,7 +426,7 @@ TEST_F(Preview, SelectsLikeTheLists)
 		rOperator.Point(shins.center(), modifiers);
 		rOperator.Point(shins.bottomRight(), modifiers);
 		EXPECT_EVENTUALLY(ToolTip() == "Template : R_Tibia<br>Template : shinRight") << ToolTip().toStdString();
-		EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "Template : R_Tibia\nTemplate : shinRight"));
+		EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "performer : R_Tibia\ncharacter : shinRight"));
 		EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
 		const QStringList before = Selected();
 		rOperator.Key(Qt::Key_Escape);

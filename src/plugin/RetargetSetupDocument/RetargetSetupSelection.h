@@ -46,7 +46,7 @@ public:
 	void SetSelectedTarget(std::int32_t i_Index) { Set(2, i_Index); }
 
 	/// Makes it the only target in the host's selection; segments stay as they are.
-	void SelectTarget(int i_Index);
+	Q_INVOKABLE void SelectTarget(int i_Index);
 
 	/// Takes over the host's selection at once; otherwise it is heard of through the dispatcher.
 	void Update();

@@ -8,6 +8,7 @@
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/Mirror.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
+#include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/SideOfName.h"
 #include "RetargetSetupDocument/StaleSelection.h"
 #include "TesselPluginInterface/ISelectionManager.h"
@@ -33,6 +34,14 @@ constexpr std::uint32_t c_Rings = 4;
 ISelectionItem TargetSegment(std::size_t i_Index)
 {
 	return {NVX::ESelectionTargetSegment, RetargetSetup::c_SubjectId, std::uint32_t(i_Index), {}};
+}
+
+/// A segment or a target of the document's subjects.
+bool IsOfSetup(const ISelectionItem& i_rItem)
+{
+	return i_rItem.m_SubjectId == RetargetSetup::c_SubjectId
+	    && (i_rItem.m_Kind == NVX::ESelectionSourceSegment || i_rItem.m_Kind == NVX::ESelectionTargetSegment
+	        || i_rItem.m_Kind == NVX::ESelectionTarget);
 }
 
 } // namespace
@@ -98,6 +107,49 @@ QString VRetargetSetupScene::SideSeen(int i_CameraType) const
 		return {};
 	return QString::fromUtf8(RetargetSetup::SideSeen(
 	    left.toVector3DAffine() - right.toVector3DAffine(), YUp(), static_cast<std::uint32_t>(i_CameraType)));
+}
+
+void VRetargetSetupScene::RememberPointedAt()
+{
+	m_Pointed = {};
+	for (const ISelectionItem& rItem : SelectionManager()->PreSelection().Items())
+		if (IsOfSetup(rItem))
+			m_Pointed = rItem;
+}
+
+QVariantList VRetargetSetupScene::PointedAt() const
+{
+	const auto pData = m_pRetargetSetup->TargetValues().m_pApplicationData;
+	QVariantList things;
+	for (const ISelectionItem& rItem : SelectionManager()->PreSelection().Items())
+		if (IsOfSetup(rItem))
+			things << QVariantMap{{"kind", rItem.m_Kind}, {"index", rItem.m_ElementIndex},
+			    {"subject",
+			        QString::fromStdString(rItem.m_Kind == NVX::ESelectionSourceSegment
+			                ? m_pRetargetSetup->GetShownSourceName()
+			                : pData ? pData->m_Skin
+			                        : "")}};
+	return things;
+}
+
+unsigned int VRetargetSetupScene::SelectPointedAt()
+{
+	const ISelectionItem item = std::exchange(m_Pointed, {});
+	if (item.m_Kind == 0)
+		return 0;
+	TesselPluginInterface::ISelection& rSelection = SelectionManager()->Selection();
+	rSelection.Remove(rSelection.ItemsOfKind(item.m_Kind));
+	rSelection.Add({item});
+	return item.m_Kind;
+}
+
+int VRetargetSetupScene::PartnerOf(bool i_bSource, int i_SegmentIndex) const
+{
+	const auto pSubject =
+	    (i_bSource ? m_pRetargetSetup->SourceValues() : m_pRetargetSetup->TargetValues()).m_pParametrised;
+	return pSubject && std::size_t(i_SegmentIndex) < pSubject->m_Segments.size()
+	    ? RetargetSetup::FindMirrorSegment(*pSubject, std::size_t(i_SegmentIndex))
+	    : -1;
 }
 
 void VRetargetSetupScene::OnShared()

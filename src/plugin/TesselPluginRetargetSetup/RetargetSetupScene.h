@@ -29,6 +29,9 @@ class VRetargetSetupScene : public Flow2Graphics::VFlowScene, public NVX::VShare
 	Q_OBJECT
 	/// What a view of it begins with, by the keys of the scene's options.
 	Q_PROPERTY(QVariantMap viewOptions READ ViewOptions CONSTANT)
+	/// Kinds of selection items.
+	Q_PROPERTY(unsigned int sourceSegmentKind READ SourceSegmentKind CONSTANT)
+	Q_PROPERTY(unsigned int targetKind READ TargetKind CONSTANT)
 
 public:
 	VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLibrary> i_pGraphicsContext,
@@ -39,6 +42,8 @@ public:
 	~VRetargetSetupScene() override;
 
 	static QVariantMap ViewOptions();
+	static unsigned int SourceSegmentKind() { return NVX::ESelectionSourceSegment; }
+	static unsigned int TargetKind() { return NVX::ESelectionTarget; }
 
 	/// All segments of both subjects.
 	std::vector<NVX::ISelectionItem> ItemsToFrame() const override;
@@ -67,6 +72,17 @@ public:
 	/// The frame in the world in which a segment's joint turns. The segment must be there.
 	void ComputeJointFrame(
 	    QMatrix4x4& o_rMatrix, const CoreOrlexTypes::VSubject& i_rSubject, std::size_t i_SegmentIndex) const;
+
+	/// What the mouse points at now is what SelectPointedAt selects.
+	Q_INVOKABLE void RememberPointedAt();
+	/// Makes it the only one of its kind in the selection.
+	/// @return its kind, 0 if the mouse pointed at no segment or target.
+	Q_INVOKABLE unsigned int SelectPointedAt();
+	/// What the mouse points at: for each segment and target {kind, index, subject}, the name of the performer or of
+	/// the character.
+	Q_INVOKABLE QVariantList PointedAt() const;
+	/// The segment of the same subject on the other side, -1 if there is none.
+	Q_INVOKABLE int PartnerOf(bool i_bSource, int i_SegmentIndex) const;
 
 signals:
 	/// Performer or character is shown, and there was none before. Where it stands is known with the next frame.
@@ -106,6 +122,7 @@ private:
 	/// What the selection is of.
 	std::string m_SelectedSource;
 	std::uint64_t m_SelectedSubject = 0;
+	NVX::ISelectionItem m_Pointed;
 	bool m_bShowsSource = false;
 	bool m_bShowsTarget = false;
 	bool m_bConnected = false;

@@ -61,6 +61,28 @@ Rectangle {
 		return lines.join("\n")
 	}
 
+	// What the mouse points at in the view: the files name both subjects alike, so that they are told apart by the names
+	// of performer and character. One thing is told in full.
+	function describePointed(text) {
+		const things = text === "" ? [] : FlowScene.PointedAt()
+		if (things.length === 0)
+			return text
+		const most = 10
+		const lines = things.slice(0, most).map(thing => {
+			if (thing.kind === FlowScene.targetKind) {
+				const index = TargetModel.index(thing.index, 0)
+				const of = role => TargetModel.data(index, role)
+				return of(RetargetSetupTargetModel.TargetType) + " target: " + of(RetargetSetupTargetModel.SourceSegment)
+					+ " to " + of(RetargetSetupTargetModel.TargetSegment)
+			}
+			const source = thing.kind === FlowScene.sourceSegmentKind
+			const name = segmentName(source ? SourceSegmentModel : TargetSegmentModel, thing.index)
+			const mapping = things.length === 1 ? mappingOf(name, source) : ""
+			return thing.subject + " : " + name + (mapping === "" ? "" : "\n" + mapping)
+		})
+		return lines.concat(things.length > most ? ["..."] : []).join("\n")
+	}
+
 	function segmentName(model, index) {
 		return model.data(model.index(index, 0), RetargetSetupSegmentModel.Name)
 	}
@@ -78,6 +100,20 @@ Rectangle {
 	function addTarget(positionTarget) {
 		run(() => ContextRetargetSetup.AddTarget(RetargetSetupSelection.selectedSourceSegment,
 			RetargetSetupSelection.selectedTargetSegment, positionTarget, commands.mirrored))
+	}
+
+	// The one that takes its place is selected then, or the one before it.
+	function removeTarget() {
+		run(() => {
+			const index = RetargetSetupSelection.selectedTarget
+			ContextRetargetSetup.RemoveTarget(index)
+			if (TargetModel.rowCount() > 0)
+				RetargetSetupSelection.SelectTarget(Math.min(index, TargetModel.rowCount() - 1))
+		})
+	}
+
+	function tell(reason) {
+		status.told = reason
 	}
 
 	// A command acts on what the operator sees: on what stands in a field that is still being typed into, and on what
@@ -159,6 +195,12 @@ Rectangle {
 		onActivated: retargetSetup.addTarget(false)
 	}
 
+	RetargetSetupMenu {
+		id: contextMenu
+		panel: retargetSetup
+		sourceList: segments.sourceList
+		targetList: segments.targetList
+	}
 	RetargetSetupFiles {
 		id: fileDialogs
 		panel: retargetSetup
@@ -192,6 +234,7 @@ Rectangle {
 			}
 			RetargetSetupTargets {
 				panel: retargetSetup
+				menu: contextMenu
 			}
 		}
 
@@ -203,6 +246,7 @@ Rectangle {
 			RetargetSetupView {
 				id: view
 				panel: retargetSetup
+				menu: contextMenu
 			}
 			RetargetSetupStatus {
 				id: status
@@ -228,6 +272,7 @@ Rectangle {
 				id: segments
 				anchors.fill: parent
 				panel: retargetSetup
+				menu: contextMenu
 			}
 		}
 	}

@@ -25,6 +25,9 @@ FocusScope {
 	// What a segment is mapped to, by its name: lines for the tool tip.
 	property var mappingOf: name => ""
 
+	// The right button was pressed on a row, or the menu key was: at a place of an item.
+	signal menuRequested(Item item, real x, real y)
+
 	readonly property var words: filter.text.toLowerCase().split(" ").filter(word => word !== "")
 
 	Accessible.role: Accessible.List
@@ -88,6 +91,13 @@ FocusScope {
 		moveTo(index)
 	}
 
+	// Selects a segment alone, and shows it whatever the filter hides.
+	function show(index) {
+		if (index >= 0 && index < view.count && !shows(nameOf(index)))
+			filter.clear()
+		selectItem(index, false)
+	}
+
 	onSelectedIndexChanged: {
 		if (selectedIndex === -1)
 			return
@@ -105,6 +115,8 @@ FocusScope {
 		event.accepted = true
 		if (index !== null)
 			event.modifiers & Qt.ShiftModifier ? selectTo(index) : selectItem(index, false)
+		else if (event.key === Qt.Key_Menu && view.currentItem)
+			menuRequested(view.currentItem, 0, view.currentItem.height)
 		else if (event.key === Qt.Key_Escape && filter.text !== "") {
 			filter.clear()
 			view.forceActiveFocus()
@@ -210,10 +222,16 @@ FocusScope {
 				id: area
 				anchors.fill: parent
 				hoverEnabled: true
+				acceptedButtons: Qt.LeftButton | Qt.RightButton
 				onEntered: SelectionManager.preselect(selectionItem)
 				onExited: SelectionManager.clearPreselection()
 				onPressed: {
 					view.forceActiveFocus()
+					if (mouse.button === Qt.RightButton) {
+						if (!watcher.selected)
+							segmentList.selectItem(index, false)
+						return segmentList.menuRequested(row, mouse.x, mouse.y)
+					}
 					if (mouse.modifiers & Qt.ShiftModifier)
 						segmentList.selectTo(index)
 					else

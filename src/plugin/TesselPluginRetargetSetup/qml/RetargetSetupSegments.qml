@@ -8,6 +8,9 @@ ColumnLayout {
 	id: segments
 
 	property Item panel: null
+	property Item menu: null
+	readonly property alias sourceList: sourceSegments
+	readonly property alias targetList: targetSegments
 	readonly property alias sourceCount: sourceSegments.count
 	readonly property alias targetCount: targetSegments.count
 
@@ -28,6 +31,7 @@ ColumnLayout {
 		model: SourceSegmentModel
 		mappingOf: name => segments.panel.mappingOf(name, true)
 		selectedIndex: RetargetSetupSelection.selectedSourceSegment
+		onMenuRequested: segments.menu.openForSegments(true, item, x, y)
 	}
 	OrlexLabel {
 		Layout.margins: Theme.spacing
@@ -45,5 +49,6 @@ ColumnLayout {
 		marksJoints: true
 		mappingOf: name => segments.panel.mappingOf(name, false)
 		selectedIndex: RetargetSetupSelection.selectedTargetSegment
+		onMenuRequested: segments.menu.openForSegments(false, item, x, y)
 	}
 }

@@ -24,6 +24,8 @@ ColumnLayout {
 		visible: fold.checked
 		Layout.fillWidth: true
 		hints: ({
+			SourceSkeleton: { none: "The folders of the preferences hold no source skeleton (.qrs)." },
+			TargetRoot: { none: "Choose a target FBX: its bones are listed here." },
 			TargetScale: {
 				check: text => subjects.panel.isNumber(text) && Number(text) > 0 ? ""
 					: "\"" + text + "\" is no scale. Give a number above 0, such as 1.25."

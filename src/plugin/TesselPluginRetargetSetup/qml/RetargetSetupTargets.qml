@@ -9,12 +9,14 @@ ColumnLayout {
 	id: targets
 
 	property Item panel: null
+	property Item menu: null
 
 	spacing: Theme.spacing
 
 	RetargetSetupTargetTable {
 		objectName: "targets"
 		Layout.fillWidth: true
+		onMenuRequested: targets.menu.openForTargets(item, x, y)
 		Keys.onDeletePressed: if (removeTarget.enabled) removeTarget.act()
 		emptyText: targets.panel.targetCount === 0
 			? "Choose a source skeleton and a target FBX above, then create the target subject."
@@ -34,7 +36,7 @@ ColumnLayout {
 		toolTip: "Delete the selected target"
 		enabled: RetargetSetupSelection.selectedTarget !== -1
 		readonly property string disabledReason: targets.panel.targetReason
-		onClicked: targets.panel.run(() => ContextRetargetSetup.RemoveTarget(RetargetSetupSelection.selectedTarget))
+		onClicked: targets.panel.removeTarget()
 	}
 
 	ParameterView {

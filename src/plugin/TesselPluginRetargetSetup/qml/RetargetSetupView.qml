@@ -9,6 +9,7 @@ ColumnLayout {
 	id: view
 
 	property Item panel: null
+	property Item menu: null
 	// Below this something would be cut off.
 	readonly property real minimumWidth: viewControls.implicitWidth + 2 * Theme.margin
 
@@ -64,6 +65,13 @@ ColumnLayout {
 				for (const key in options)
 					sceneOptions[key] = options[key]
 				FrameAll()
+			}
+
+			// A drag with this button goes nearer.
+			TapHandler {
+				acceptedButtons: Qt.RightButton
+				onPressedChanged: if (pressed) FlowScene.RememberPointedAt()
+				onTapped: view.menu.openForView(sceneFBO, eventPoint.position.x, eventPoint.position.y)
 			}
 		}
 		Connections {
@@ -127,6 +135,7 @@ ColumnLayout {
 
 		SceneToolTip {
 			scene: sceneFBO
+			describe: text => view.panel.describePointed(text)
 		}
 	}
 }

@@ -7,9 +7,11 @@ ToolTip {
 	id: toolTip
 
 	property var scene: null
+	// What is told of what the scene names.
+	property var describe: text => text
 
 	// Names come from files: they stay plain text, and only what parts them becomes a line.
-	text: scene ? scene.toolTipText.replace(/<br>/g, "\n") : ""
+	text: scene ? describe(scene.toolTipText.replace(/<br>/g, "\n")) : ""
 	x: scene ? scene.mousePos.x + 10 : 0
 	y: scene ? scene.mousePos.y + 10 : 0
 	visible: text !== ""

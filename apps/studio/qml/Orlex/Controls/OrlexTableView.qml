@@ -18,6 +18,9 @@ FocusScope {
 	property int selectedIndex: -1
 	readonly property alias count: list.count
 	readonly property alias view: list
+	// The right button was pressed on a row, which is selected by now, or the menu key was: at a place of an item.
+	signal menuRequested(Item item, real x, real y)
+
 	// What stands in the middle of a table without rows.
 	property string emptyText: ""
 
@@ -129,6 +132,8 @@ FocusScope {
 				table.selectRow(0)
 			else if (event.key === Qt.Key_End)
 				table.selectRow(count - 1)
+			else if (event.key === Qt.Key_Menu && currentItem)
+				table.menuRequested(currentItem, 0, currentItem.height)
 			else
 				event.accepted = false
 		}
@@ -144,10 +149,14 @@ FocusScope {
 			width: list.width
 			height: Theme.itemHeight
 			hoverEnabled: true
-			acceptedButtons: Qt.LeftButton
+			acceptedButtons: Qt.LeftButton | Qt.RightButton
 			onEntered: if (selectionItem !== undefined) SelectionManager.preselect(selectionItem)
 			onExited: SelectionManager.clearPreselection()
-			onPressed: table.selectRow(index)
+			onPressed: {
+				table.selectRow(index)
+				if (mouse.button === Qt.RightButton)
+					table.menuRequested(row, mouse.x, mouse.y)
+			}
 			Accessible.role: Accessible.Row
 			Accessible.name: table.columns.map(column => table.cellText(model[column.role])).join(", ")
 			Accessible.selected: watcher.selected

@@ -30,7 +30,7 @@ Item {
 		displayText: currentIndex >= 0 ? currentText : editor.foreign ? editor.row.valueText : ""
 		placeholderText: count > 0 ? "Not set" : "Nothing to choose from"
 		textColor: editor.foreign ? Theme.warning : Theme.text
-		toolTip: editor.foreign ? "This value is not in the list" : ""
+		toolTip: editor.foreign ? "This value is not in the list" : count === 0 && editor.row && editor.row.hint.none || ""
 		invalid: !!editor.row && editor.row.error !== ""
 		Accessible.name: editor.row ? editor.row.label : ""
 		onActivated: {

@@ -11,7 +11,7 @@ Item {
 	property int parameterIndex: -1
 	property var groupModel
 	property int labelWidth: 100
-	// {unit, check}, as in ParameterView.
+	// {unit, check, none}, as in ParameterView.
 	property var hint: ({})
 
 	property int generation: 0

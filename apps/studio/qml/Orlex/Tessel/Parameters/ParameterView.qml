@@ -9,8 +9,8 @@ FocusScope {
 
 	property var model: null
 	property int labelWidth: 100
-	// By a parameter's name, what it does not tell itself: {unit, check}. "check" gets what was typed and returns why it
-	// is refused, or an empty text.
+	// By a parameter's name, what it does not tell itself: {unit, check, none}. "check" gets what was typed and returns
+	// why it is refused, or an empty text; "none" tells why there is nothing to choose from.
 	property var hints: ({})
 	property alias advancedShown: fold.checked
 	property int generation: 0
