@@ -68,7 +68,7 @@ Rectangle {
 		if (things.length === 0)
 			return text
 		const most = 10
-		const lines = things.slice(0, most).map(thing => {
+		const lines = things.map(thing => {
 			if (thing.kind === FlowScene.targetKind) {
 				const index = TargetModel.index(thing.index, 0)
 				const of = role => TargetModel.data(index, role)
@@ -80,7 +80,8 @@ Rectangle {
 			const mapping = things.length === 1 ? mappingOf(name, source) : ""
 			return thing.subject + " : " + name + (mapping === "" ? "" : "\n" + mapping)
 		})
-		return lines.concat(things.length > most ? ["..."] : []).join("\n")
+		lines.sort()
+		return lines.slice(0, most).concat(lines.length > most ? ["..."] : []).join("\n")
 	}
 
 	function segmentName(model, index) {
