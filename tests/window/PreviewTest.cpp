@@ -426,7 +426,7 @@ TEST_F(Preview, SelectsLikeTheLists)
 		rOperator.Point(shins.center(), modifiers);
 		rOperator.Point(shins.bottomRight(), modifiers);
 		EXPECT_EVENTUALLY(ToolTip() == "Template : R_Tibia<br>Template : shinRight") << ToolTip().toStdString();
-		EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "performer : R_Tibia\ncharacter : shinRight"));
+		EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "character : shinRight\nperformer : R_Tibia"));
 		EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
 		const QStringList before = Selected();
 		rOperator.Key(Qt::Key_Escape);
