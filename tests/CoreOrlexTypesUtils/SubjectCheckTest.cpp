@@ -14,62 +14,43 @@ using EJointType = VSubjectParametrised::VJoint::EJointType;
 /// empty where any number is right.
 struct VSizeMessages
 {
-	const char* m_pMarkers;
-	const char* m_pRotations;
-	const char* m_pSegments;
-	const char* m_pState;
-	const char* m_pCovariance;
+	std::string m_Markers;
+	std::string m_Rotations;
+	std::string m_Segments;
+	std::string m_State;
+	std::string m_Covariance;
 };
 
-/// From ELocalPointToWorldPoint on.
-const VSizeMessages c_SizeMessages[] = {
-    {"Incorrect number of markers, ELocalPointToWorldPoint type expects 1 marker",
-        "Incorrect number of rotation observations, ELocalPointToWorldPoint type expects no rotation observations",
-        "Incorrect number of parent segments, ELocalPointToWorldPoint type expects 1 segment",
-        "Incorrect state size, ELocalPointToWorldPoint type expects size 3", ""},
-    {"Incorrect number of markers, ELocalPointToWorldPointGaussian type expects 1 marker",
-        "Incorrect number of rotation observations, ELocalPointToWorldPointGaussian type expects no rotation "
-        "observations",
-        "Incorrect number of parent segments, ELocalPointToWorldPointGaussian type expects 1 segment",
-        "Incorrect state size, ELocalPointToWorldPointGaussian type expects size 3",
-        "Incorrect covariance size, ELocalPointToWorldPointGaussian type expects size 9"},
-    {"Incorrect number of markers, ELocalPlaneToWorldPoint type expects 1 marker",
-        "Incorrect number of rotation observations, ELocalPlaneToWorldPoint type expects no rotation observations",
-        "Incorrect number of parent segments, ELocalPlaneToWorldPoint type expects 1 segment",
-        "Incorrect state size, ELocalPlaneToWorldPoint type expects size 6", ""},
-    {"Incorrect number of markers, ELocalPlaneToWorldPointGaussian type expects 1 marker",
-        "Incorrect number of rotation observations, ELocalPlaneToWorldPointGaussian type expects no rotation "
-        "observations",
-        "Incorrect number of parent segments, ELocalPlaneToWorldPointGaussian type expects 1 segment",
-        "Incorrect state size, ELocalPlaneToWorldPointGaussian type expects size 6",
-        "Incorrect covariance size, ELocalPlaneToWorldPointGaussian type expects size 1"},
-    {"Incorrect number of markers, ELocalLineToWorldPoint type expects 1 marker",
-        "Incorrect number of rotation observations, ELocalLineToWorldPoint type expects no rotation observations",
-        "Incorrect number of parent segments, ELocalLineToWorldPoint type expects 1 segment",
-        "Incorrect state size, ELocalLineToWorldPoint type expects size 6", ""},
-    {"Incorrect number of markers, ELocalLineToWorldPointGaussian type expects 1 marker",
-        "Incorrect number of rotation observations, ELocalLineToWorldPointGaussian type expects no rotation "
-        "observations",
-        "Incorrect number of parent segments, ELocalLineToWorldPointGaussian type expects 1 segment",
-        "Incorrect state size, ELocalLineToWorldPointGaussian type expects size 6",
-        "Incorrect covariance size, ELocalLineToWorldPointGaussian type expects size 4"},
-    {"Incorrect number of markers, ERigidBody type expects at least 3 markers",
-        "Incorrect number of rotation observations, ERigidBody type expects no rotation observations",
-        "Incorrect number of parent segments, ERigidBody type expects 1 segment",
-        "Incorrect state size, ERigidBody type expects size 3*(MarkerCount+2)",
-        "Incorrect covariance size, ERigidBody type expects size 36 + 9*MarkerCount"},
-    {"Incorrect number of markers, ElocalRotationToWorldRotation type expects no markers",
-        "Incorrect number of rotation observations, ElocalRotationToWorldRotation type expects 1 rotation observation",
-        "Incorrect number of parent segments, ElocalRotationToWorldRotation type expects 1 segment",
-        "Incorrect state size, ElocalRotationToWorldRotation type expects size 3",
-        "Incorrect covariance size, ElocalRotationToWorldRotation type expects size 0"},
-    {"Incorrect number of markers, ELocalDirectionToWorldDirection type expects no markers",
-        "Incorrect number of rotation observations, ELocalDirectionToWorldDirection type expects 1 rotation "
-        "observation",
-        "Incorrect number of parent segments, ELocalDirectionToWorldDirection type expects 1 segment",
-        "Incorrect state size, ELocalDirectionToWorldDirection type expects size 3",
-        "Incorrect covariance size, ELocalDirectionToWorldDirection type expects size 0"},
-};
+VSizeMessages SizeMessages(int i_Type)
+{
+	constexpr const char* c_None = "no rotation observations";
+	constexpr const char* c_One = "1 rotation observation";
+	static constexpr struct
+	{
+		const char* m_pType;
+		const char* m_pMarkers;
+		const char* m_pRotations;
+		const char* m_pState;
+		const char* m_pCovariance;
+	} c_Rows[] = {
+	    {"ELocalPointToWorldPoint", "1 marker", c_None, "3", nullptr},
+	    {"ELocalPointToWorldPointGaussian", "1 marker", c_None, "3", "9"},
+	    {"ELocalPlaneToWorldPoint", "1 marker", c_None, "6", nullptr},
+	    {"ELocalPlaneToWorldPointGaussian", "1 marker", c_None, "6", "1"},
+	    {"ELocalLineToWorldPoint", "1 marker", c_None, "6", nullptr},
+	    {"ELocalLineToWorldPointGaussian", "1 marker", c_None, "6", "4"},
+	    {"ERigidBody", "at least 3 markers", c_None, "3*(MarkerCount+2)", "36 + 9*MarkerCount"},
+	    {"ElocalRotationToWorldRotation", "no markers", c_One, "3", "0"},
+	    {"ELocalDirectionToWorldDirection", "no markers", c_One, "3", "0"},
+	};
+	const auto& rRow = c_Rows[i_Type - 1];
+	const std::string expects = std::string(", ") + rRow.m_pType + " type expects ";
+	return {"Incorrect number of markers" + expects + rRow.m_pMarkers,
+	    "Incorrect number of rotation observations" + expects + rRow.m_pRotations,
+	    "Incorrect number of parent segments" + expects + "1 segment",
+	    "Incorrect state size" + expects + "size " + rRow.m_pState,
+	    rRow.m_pCovariance ? "Incorrect covariance size" + expects + "size " + rRow.m_pCovariance : ""};
+}
 
 VTarget GoodTarget(VTarget::ETargetType i_Type)
 {
@@ -102,6 +83,12 @@ VTarget GoodTarget(VTarget::ETargetType i_Type)
 	default: break;
 	}
 	return target;
+}
+
+template <typename TList, typename... TValues>
+void Set(TList& o_rList, TValues... i_Values)
+{
+	o_rList = TList{typename TList::value_type(i_Values)...};
 }
 
 /// Two segments, four markers, two rotations, one good target of each type.
@@ -159,22 +146,22 @@ TEST_F(SubjectCheck, SizesOfTargetsByType)
 	for (int type = 1; type < 10; ++type)
 	{
 		SCOPED_TRACE(type);
-		const VSizeMessages& rMessages = c_SizeMessages[type - 1];
+		const VSizeMessages messages = SizeMessages(type);
 		const VTarget good = GoodTarget(VTarget::ETargetType(type));
-		const auto expect = [&](auto VTarget::*i_pList, const char* i_pMessage)
+		const auto expect = [&](auto VTarget::*i_pList, const std::string& i_rMessage)
 		{
 			for (const int step : {(good.*i_pList).empty() ? 2 : -1, 1})
 				EXPECT_EQ(TargetMessages(type, [&](VTarget& io_rTarget) { resize(io_rTarget.*i_pList, step); }),
-				    VTexts{i_pMessage});
+				    VTexts{i_rMessage});
 		};
 		if (type != VTarget::ERigidBody)
-			expect(&VTarget::m_MarkerIndices, rMessages.m_pMarkers);
+			expect(&VTarget::m_MarkerIndices, messages.m_Markers);
 		if (type < VTarget::ELocalRotationToWorldRotation)
-			expect(&VTarget::m_RotationObservationIndices, rMessages.m_pRotations);
-		expect(&VTarget::m_SegmentIndices, rMessages.m_pSegments);
-		expect(&VTarget::m_State, rMessages.m_pState);
-		if (*rMessages.m_pCovariance)
-			expect(&VTarget::m_Covariance, rMessages.m_pCovariance);
+			expect(&VTarget::m_RotationObservationIndices, messages.m_Rotations);
+		expect(&VTarget::m_SegmentIndices, messages.m_Segments);
+		expect(&VTarget::m_State, messages.m_State);
+		if (!messages.m_Covariance.empty())
+			expect(&VTarget::m_Covariance, messages.m_Covariance);
 		else
 			EXPECT_EQ(TargetMessages(type,
 			              [](VTarget& io_rTarget)
@@ -184,12 +171,12 @@ TEST_F(SubjectCheck, SizesOfTargetsByType)
 			              }),
 			    VTexts{"Invalid target view normals"});
 	}
-	const VSizeMessages& rRigidBody = c_SizeMessages[VTarget::ERigidBody - 1];
+	const VSizeMessages rigidBody = SizeMessages(VTarget::ERigidBody);
 	EXPECT_EQ(TargetMessages(VTarget::ERigidBody, [](VTarget& io_rTarget) { io_rTarget.m_MarkerIndices.pop_back(); }),
-	    VTexts{rRigidBody.m_pMarkers});
+	    VTexts{rigidBody.m_Markers});
 	// A fourth marker asks for more values.
 	EXPECT_EQ(TargetMessages(VTarget::ERigidBody, [](VTarget& io_rTarget) { io_rTarget.m_MarkerIndices.push_back(2); }),
-	    VTexts{rRigidBody.m_pState});
+	    VTexts{rigidBody.m_State});
 }
 
 TEST_F(SubjectCheck, TypesThatAskForARotationOnlyComplainOfAnotherNumber)
@@ -201,7 +188,7 @@ TEST_F(SubjectCheck, TypesThatAskForARotationOnlyComplainOfAnotherNumber)
 			subject.m_Targets[type].m_RotationObservationIndices.resize(count);
 			TakeLog();
 			EXPECT_TRUE(CheckTarget(subject, type));
-			EXPECT_EQ(TakeLog(), VTexts{c_SizeMessages[type - 1].m_pRotations});
+			EXPECT_EQ(TakeLog(), VTexts{SizeMessages(type).m_Rotations});
 		}
 }
 
@@ -210,7 +197,7 @@ TEST_F(SubjectCheck, TheFirstWrongSizeOfATargetIsTold)
 	for (int type = 1; type < 10; ++type)
 	{
 		SCOPED_TRACE(type);
-		const VSizeMessages& rMessages = c_SizeMessages[type - 1];
+		const VSizeMessages messages = SizeMessages(type);
 		VTarget bad = GoodTarget(VTarget::ETargetType(type));
 		bad.m_MarkerIndices.resize(2);
 		bad.m_RotationObservationIndices.resize(2);
@@ -241,13 +228,13 @@ TEST_F(SubjectCheck, TheFirstWrongSizeOfATargetIsTold)
 			step(&VTarget::m_SegmentIndices);
 			step(&VTarget::m_State);
 		}
-		if (*rMessages.m_pCovariance)
+		if (!messages.m_Covariance.empty())
 			step(&VTarget::m_Covariance);
 		step(&VTarget::m_ViewNormals);
 		VTexts expected = bDirection
-		    ? VTexts{rMessages.m_pSegments, rMessages.m_pState, rMessages.m_pMarkers, rMessages.m_pCovariance}
-		    : VTexts{rMessages.m_pMarkers, rMessages.m_pRotations, rMessages.m_pSegments, rMessages.m_pState,
-		        rMessages.m_pCovariance};
+		    ? VTexts{messages.m_Segments, messages.m_State, messages.m_Markers, messages.m_Covariance}
+		    : VTexts{
+		        messages.m_Markers, messages.m_Rotations, messages.m_Segments, messages.m_State, messages.m_Covariance};
 		if (bRotation && !bDirection)
 			expected.erase(expected.begin() + 1);
 		std::erase(expected, "");
@@ -287,32 +274,12 @@ TEST_F(SubjectCheck, ValuesOfTargets)
 	        {"Incorrect rotation target orientation size. Expected 3. Actual 2 "}},
 	    {8, [](VTarget& io_r) { io_r.m_RotationCalibrationBehaviour = VTarget::ERotationCalibrationBehaviourType(9); },
 	        {"Incorrect rotation target orientation size. Expected 3. Actual 0 "}},
-	    {9,
-	        [](VTarget& io_r) {
-		        io_r.m_State = {1.0006, 0, 0};
-	        },
-	        {unit}},
-	    {9,
-	        [](VTarget& io_r) {
-		        io_r.m_State = {0.9994, 0, 0};
-	        },
-	        {unit}},
-	    {9,
-	        [](VTarget& io_r) {
-		        io_r.m_State = {0, c_NaN, 1};
-	        },
-	        {unit}},
-	    {9,
-	        [](VTarget& io_r) {
-		        io_r.m_State = {0, 1e200, 0};
-	        },
-	        {unit}},
+	    {9, [](VTarget& io_r) { Set(io_r.m_State, 1.0006, 0, 0); }, {unit}},
+	    {9, [](VTarget& io_r) { Set(io_r.m_State, 0.9994, 0, 0); }, {unit}},
+	    {9, [](VTarget& io_r) { Set(io_r.m_State, 0, c_NaN, 1); }, {unit}},
+	    {9, [](VTarget& io_r) { Set(io_r.m_State, 0, 1e200, 0); }, {unit}},
 	    {1, [](VTarget& io_r) { io_r.m_MarkerIndices = {4}; }, {"Out of range marker index 4"}},
-	    {0,
-	        [](VTarget& io_r) {
-		        io_r.m_MarkerIndices = {3, 0xFFFFFFFF};
-	        },
-	        {"Out of range marker index 4294967295"}},
+	    {0, [](VTarget& io_r) { Set(io_r.m_MarkerIndices, 3, 0xFFFFFFFF); }, {"Out of range marker index 4294967295"}},
 	    {8, [](VTarget& io_r) { io_r.m_RotationObservationIndices = {2}; },
 	        {"Out of range rotation observation index 2"}},
 	    {1, [](VTarget& io_r) { io_r.m_SegmentIndices = {2}; }, {"Out of range segment index 2"}},
@@ -340,25 +307,10 @@ TEST_F(SubjectCheck, ValuesOfTargets)
 	        {"Out of range segment index 9"}},
 	    {1, [](VTarget& io_r) { io_r.m_ViewNormals.clear(); }, {normals}},
 	    {1, [](VTarget& io_r) { io_r.m_ViewNormals.resize(2); }, {normals}},
-	    {1,
-	        [](VTarget& io_r) {
-		        io_r.m_ViewNormals[0] = {0.5, 0, 0};
-	        },
-	        {normals}},
-	    {1,
-	        [](VTarget& io_r) {
-		        io_r.m_ViewNormals[0] = {0, 1 + 2e-6, 0};
-	        },
-	        {normals}},
-	    {1,
-	        [](VTarget& io_r) {
-		        io_r.m_ViewNormals[0] = {0, 0, c_NaN};
-	        },
-	        {normals}},
-	    {8,
-	        [](VTarget& io_r) {
-		        io_r.m_RotationObservationIndices = {0, 2};
-	        },
+	    {1, [](VTarget& io_r) { Set(io_r.m_ViewNormals[0], 0.5, 0, 0); }, {normals}},
+	    {1, [](VTarget& io_r) { Set(io_r.m_ViewNormals[0], 0, 1 + 2e-6, 0); }, {normals}},
+	    {1, [](VTarget& io_r) { Set(io_r.m_ViewNormals[0], 0, 0, c_NaN); }, {normals}},
+	    {8, [](VTarget& io_r) { Set(io_r.m_RotationObservationIndices, 0, 2); },
 	        {"Incorrect number of rotation observations, ElocalRotationToWorldRotation type expects 1 rotation "
 	         "observation",
 	            "Out of range rotation observation index 2"}},

@@ -228,8 +228,9 @@ void ExpectEqual(const VSkin (&i_rSkins)[2])
 		for (std::size_t part = 0; part < rA.m_Parts.size(); ++part)
 		{
 			EXPECT_EQ(rA.m_Parts[part].m_Indices, rB.m_Parts[part].m_Indices);
-			for (int k = 0; k < 4; ++k)
-				EXPECT_FLOAT_EQ(rA.m_Parts[part].m_Diffuse[k], rB.m_Parts[part].m_Diffuse[k]);
+			for (const auto pColour : {&VMeshPart::m_Diffuse, &VMeshPart::m_Transparent})
+				for (int k = 0; k < 4; ++k)
+					EXPECT_FLOAT_EQ((rA.m_Parts[part].*pColour)[k], (rB.m_Parts[part].*pColour)[k]);
 		}
 		ASSERT_EQ(rA.m_Vertices.size(), rB.m_Vertices.size());
 		for (std::size_t vertex = 0; vertex < rA.m_Vertices.size(); ++vertex)

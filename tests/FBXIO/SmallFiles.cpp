@@ -271,7 +271,7 @@ static VList OldRecords(const VNumbers& i_rMatrix)
 	return {Record("FBXHeaderExtension", {}, {Record("FBXVersion", {5800})}),
 	    Record("Model", {"body"},
 	        {Record("Material", {"first"}, {Record("Diffuse", {1.0, 0.5, 0.0})}),
-	            Record("Material", {"second"}, {Record("ShadingModel", {"lambert"})}),
+	            Record("Material", {"second"}, {Record("ShadingModel", {"lambert"}), Record("Alpha", {0.75})}),
 	            Record("Texture", {"picture"}, {Record("RelativeFilename", {"none.png"})}),
 	            Record("Vertices", {VNumbers{0, 0, 0, 1, 0, 0, 0, 1, 0, 1, 1, 0}}),
 	            Record("Normals", {VNumbers{0, 0, 1, 0, 0, 1, 0, 0, 1, 0, 0, 1}}),
@@ -301,7 +301,8 @@ std::vector<VTestRecord> FbxTest::SmallRecords(const VSmallFile& i_rFile)
 	        {"ByVertice", "Direct", {0, 0, 1, 0, 0, 1, 0, 0, 1, 0, 0, 1}, {}},
 	        {"ByPolygonVertex", "IndexToDirect", {0, 0, 1, 0, 0, 1, 1, 1}, {0, 1, 2, 1, 3, 2}},
 	        {"ByPolygon", "IndexToDirect", {}, {0, 1}},
-	        {{"phong", {{"DiffuseColor", {1, 0.5, 0}}}, "", "none.png"}, {"lambert", {}, "", ""}},
+	        {{"phong", {{"DiffuseColor", {1, 0.5, 0}}}, "", "none.png"},
+	            {"lambert", {{"TransparentColor", {0.25, 0.25, 0.25}}, {"TransparencyFactor", {1}}}, "", ""}},
 	        {{0, {0, 1, 2}, {1, 0.5, 0.25}, matrix, matrix}, {1, {1, 2, 3}, {0.5, 0.75, 1}, matrix, matrix}}}});
 	if (!i_rFile.m_bPlain)
 		return records;

@@ -379,6 +379,7 @@ TEST_F(Document, AsksItsHostBeforeUnsavedChangesAreReplaced)
 	const auto edit = [this] { m_Document.AddTarget(0, 0, true, false); };
 	const auto create = [this] { m_Document.CreateTargetSubject(); };
 	const auto load = [&] { m_Document.LoadTargetSubjectURL(file); };
+	const auto begin = [this] { m_Document.NewTargetSubject(); };
 	const auto nothing = [] {};
 	const struct
 	{
@@ -403,7 +404,9 @@ TEST_F(Document, AsksItsHostBeforeUnsavedChangesAreReplaced)
 		        pHost->m_Meanwhile = [this]
 		        { EXPECT_FALSE(m_Document.LoadTargetFBX(RETARGET_TEST_DATA "/fbx/cases/no_skeleton.fbx")); };
 	        },
-	        create, true, "Create Target Subject;", true}};
+	        create, true, "Create Target Subject;", true},
+	    {"an edit, kept from New", edit, begin, false, "New Retarget Subject;", false},
+	    {"still there, given up for New", nothing, begin, true, "New Retarget Subject;", true}};
 	for (const auto& rRow : rows)
 	{
 		SCOPED_TRACE(rRow.m_pName);
@@ -475,6 +478,10 @@ TEST_F(Document, AsksItsHostBeforeAChangedFileIsOverwritten)
 	m_Document.SaveTargetSubjectURL(url);
 	EXPECT_EQ(pHost->m_Asked, "") << "nothing is lost where there is nothing";
 	EXPECT_TRUE(boost::filesystem::exists(file));
+	write("of another program");
+	m_Document.SaveTargetSubjectURL(QUrl::fromLocalFile(QString::fromStdString((m_Folder / "b.qrr").string())));
+	m_Document.SaveTargetSubjectURL(url);
+	EXPECT_EQ(pHost->m_Asked, "") << "Save As has asked already";
 }
 
 } // namespace

@@ -242,6 +242,7 @@ TEST_F(Flow, TheScaleLeavesTheRootWhereItIsOrTakesItAlong)
 	EXPECT_NE(log.Take().find("mm above the floor, and at scale 1 it is"), std::string::npos);
 	m_Document.SetScaleRootHeight(true);
 	EXPECT_NEAR(lowest(), 0.5 * height, 0.01) << "at once";
+	EXPECT_EQ(Target().m_Segments[0].m_Joint.m_Mean, Target().m_Segments[0].m_Joint.m_BindPose);
 	m_Document.SetTargetScale(2.0);
 	EXPECT_NEAR(lowest(), 2.0 * height, 0.01);
 	EXPECT_FALSE(m_Document.DifferenceFromFile());
@@ -251,12 +252,18 @@ TEST_F(Flow, TheScaleLeavesTheRootWhereItIsOrTakesItAlong)
 	m_Document.SetScaleRootHeight(false);
 	EXPECT_NEAR(lowest(), root + 2.0 * (height - root), 0.01);
 	EXPECT_NE(log.Take().find("mm below the floor, and at scale 1 it is"), std::string::npos);
+	ASSERT_TRUE(m_Document.LoadTargetFBX(c_Demo / "character.fbx"));
 	for (const bool bScale : {false, true})
 	{
 		m_Document.SetScaleRootHeight(bScale);
 		log.Take();
 		m_Document.CreateTargetSubject();
 		EXPECT_EQ(log.Take().find("the lowest segment") != std::string::npos, !bScale);
+		const float hips = (m_Document.GetTargetAxisMatrix() * m_Document.GetFBXSkeleton()->front().m_Global)(2, 3);
+		EXPECT_NEAR(Target().m_Segments[0].m_Joint.m_BindPose.at(5), bScale ? 2.0 * hips : hips, 0.01);
+		m_Document.SaveTargetSubject(m_Folder / "made.qrr");
+		m_Document.CreateTargetSubject();
+		EXPECT_TRUE(m_Document.HasUnsavedChanges()) << "made anew it is in no file";
 	}
 }
 
@@ -268,7 +275,9 @@ TEST_F(Flow, AnFBXFileThatGivesNoSkeleton)
 	const VLogRecorder quiet;
 	EXPECT_FALSE(m_Document.LoadTargetFBX(m_Folder / "missing.fbx"));
 	EXPECT_EQ(m_Document.GetFBXSkeleton(), pSkeleton);
+	EXPECT_EQ(m_Document.GetTargetFBXError(), "There is no such file");
 	EXPECT_FALSE(m_Document.LoadTargetFBX(c_Cases / "no_skeleton.fbx"));
+	EXPECT_EQ(m_Document.GetTargetFBXError(), "It holds no skeleton");
 	EXPECT_FALSE(m_Document.GetFBXSkeleton());
 	EXPECT_EQ(Target().m_Segments.size(), 39u);
 	m_Document.CreateTargetSubject();

@@ -35,6 +35,8 @@ private:
 };
 
 constexpr const char* c_NoSource = "There is no source subject. Choose a source skeleton first.";
+constexpr const char* c_NotItsFBX =
+    "The segments of the target subject are not the bones of the FBX file. Choose the FBX file that it was made from.";
 constexpr const char* c_NoTarget = "There is no target subject. Create one, or open a retarget subject file.";
 
 TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
@@ -73,10 +75,7 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	    {"a source", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); }, c_NoTarget},
 	    {"both", [this] { SetSmallSubjects(); }, "AddTarget", [this] { m_Document.AddTarget(-1, 0, true, true); },
 	        "No single segment of the source subject is selected."},
-	    {"both", [] {}, "MatchFilePose", [this] { m_Document.MatchFilePose(); },
-	        "The segments of the target subject are not the bones of the FBX file. Choose the FBX file that it was "
-	        "made "
-	        "from."},
+	    {"both", [] {}, "MatchFilePose", [this] { m_Document.MatchFilePose(); }, c_NotItsFBX},
 	    {"its FBX, a hinge",
 	        [this]
 	        {
@@ -90,6 +89,14 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	        "The target subject has joints, post poses or parameters of its own, which the pose of an FBX file does "
 	        "not "
 	        "fit."},
+	    {"another FBX of the same bones",
+	        [this]
+	        {
+		        m_Document.CreateTargetSubject();
+		        boost::filesystem::copy_file(RETARGET_SOURCE "/demo/character.fbx", m_Folder / "other.fbx");
+		        ASSERT_TRUE(m_Document.LoadTargetFBX(m_Folder / "other.fbx"));
+	        },
+	        "MatchFilePose", [this] { m_Document.MatchFilePose(); }, c_NotItsFBX},
 	    {"both", [this] { SetSmallSubjects(); }, "AddTarget", [this] { m_Document.AddTarget(0, 5, false, false); },
 	        "No single segment of the target subject is selected."},
 	    {"both", [] {}, "RemoveTarget", [this] { m_Document.RemoveTarget(-1); }, "No single target is selected."},
