@@ -45,7 +45,9 @@ public:
 	/// For all categories, those made later included.
 	static void SetDefaultLevel(int i_Level);
 
-	/// The sink receives messages for as long as the returned token lives, on the thread that logs.
+	/// The sink receives messages for as long as the returned token lives, on the thread that logs. The token's end
+	/// waits for calls of the sink that run on other threads, so that nothing which a sink uses has to outlive its
+	/// token: let go of it without a lock that the sink takes. Within a call of any sink it waits for nothing.
 	/// While there is no sink, messages go to standard error.
 	[[nodiscard]] static std::shared_ptr<void> AddSink(VLogSink i_Sink);
 };
