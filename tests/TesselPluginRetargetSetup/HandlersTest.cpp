@@ -130,6 +130,10 @@ TEST_F(Handlers, WhatIsSavedHoldsWhatWasJustTyped)
 	EXPECT_EQ(m_pDocument->GetTargetScale(), 2.0);
 	Run();
 	EXPECT_EQ(m_Changes, 2) << "and is not applied again";
+	auto& rSelection = m_Context.SelectionManager().Selection();
+	rSelection.Remove(rSelection.ItemsOfKind(NVX::ESelectionTarget));
+	m_pWidget->ApplyParameters();
+	EXPECT_EQ(m_pSelection->SelectedTarget(), -1) << "nor is a command for what is selected no more";
 }
 
 TEST_F(Handlers, WhatTheDocumentRefusesIsShownAsItIsAgain)
@@ -211,14 +215,21 @@ TEST_F(Handlers, SeveralRootBonesAreToldUnlessOneIsChosen)
 	OpenDemo();
 	m_Context.Folders().SetFolder("FolderSkins", RETARGET_TEST_DATA "/fbx/cases");
 	Run();
+	fs::copy_file(RETARGET_TEST_DATA "/fbx/cases/plain_parents.fbx", m_Folder / "other.fbx");
 	EXPECT_EQ(Type("TargetFBX", "plain_parents"), "");
-	for (const char* const pRoot : {"", "1", "0"})
+	for (const char* const pRoot : {"", "1", "0", "1", "another file"})
 	{
-		if (*pRoot)
+		const bool bChosen = *pRoot == '0' || *pRoot == '1';
+		if (bChosen)
 			Type("TargetRoot", pRoot);
+		else if (*pRoot)
+			Parameter("TargetFBX").SetValue(ToVariant((m_Folder / "other.fbx").string()));
+		Run();
+		// As every button does first.
+		m_pWidget->ApplyParameters();
 		TakeLog();
 		m_pDocument->CreateTargetSubject();
-		EXPECT_EQ(TakeLog().find("root bones, and no root was chosen") != std::string::npos, !*pRoot) << pRoot;
+		EXPECT_EQ(TakeLog().find("root bones, and no root was chosen") != std::string::npos, !bChosen) << pRoot;
 	}
 }
 
@@ -324,6 +335,7 @@ TEST_F(Handlers, AFileThatGivesNothingIsToldWhileItIsChosen)
 		const std::string log = TakeLog();
 		EXPECT_NE(log.find(rRow.m_Log), std::string::npos) << log;
 		EXPECT_EQ(m_pWidget->Remarks().toStdString(), rRow.m_Remarks);
+		EXPECT_EQ(Parameter("TargetRoot").GetEnumeration().empty(), !m_pDocument->GetFBXSkeleton());
 	}
 	EXPECT_EQ(Property("remarks", "text").toString(), "");
 	m_pDocument->CreateTargetSubject();

@@ -201,6 +201,10 @@ TEST_F(Edit, WhatSurprisesIsTold)
 	    std::string::npos)
 	    << built.m_Err;
 	EXPECT_EQ(Create({"--match-file-pose"}, arnaud).m_Err.find("as built"), std::string::npos);
+	const VRun mistyped = m_Folder.Run({"create", "--fbx", arnaud, "--pose", "Nobody=1,2,3", "-o", "y.qrr"});
+	EXPECT_EQ(mistyped.m_Err.find("as built"), std::string::npos) << "nothing is";
+	EXPECT_EQ(m_Folder.Run({"dump", "x.qrr"}).m_Err, "") << "of what was written here";
+	EXPECT_EQ(m_Folder.Run({"edit", "x.qrr", "-o", "y.qrr"}).m_Err, "");
 
 	const VRun other = m_Folder.Run({"edit", "x.qrr", "--source", Data("../../demo/performer.qrs"), "-o", "y.qrr"});
 	EXPECT_EQ(other.m_Err.find("made for the source"), std::string::npos) << "of the same name";
@@ -234,6 +238,12 @@ TEST_F(Edit, ToStandardOutput)
 	std::size_t followers = 0;
 	for (std::size_t i = 0; i < json.size(); ++i)
 	{
+		const std::string name = json[i]["name"];
+		EXPECT_EQ(json[i]["side"],
+		    name.starts_with("Left")        ? "left"
+		        : name.starts_with("Right") ? "right"
+		                                    : "")
+		    << name;
 		for (const char* pKey : {"index", "parent", "side"})
 			EXPECT_EQ(json[i].at(pKey), bones[i].at(pKey)) << i;
 		EXPECT_NEAR(json[i].at("length"), bones[i].at("length"), 1e-3) << i;
