@@ -21,6 +21,7 @@
 #include <QDir>
 #include <QDockWidget>
 #include <QDropEvent>
+#include <QFileDialog>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
@@ -70,9 +71,14 @@ protected:
 
 	void LoadPanel() { ASSERT_TRUE(m_pWindow->LoadModule(RETARGET_MODULE)); }
 
+	std::shared_ptr<TesselPluginInterface::IParameterGroup> Parameters()
+	{
+		return m_pWindow->Context().GetParameterRegistry()->Find("RetargetSetup", "Subject");
+	}
+
 	std::string Parameter(const char* i_pName)
 	{
-		const auto pGroup = m_pWindow->Context().GetParameterRegistry()->Find("RetargetSetup", "Subject");
+		const auto pGroup = Parameters();
 		return pGroup ? pGroup->Find(i_pName)->GetValueText() : "no group";
 	}
 
@@ -118,8 +124,9 @@ protected:
 		            .value<QObject*>();
 	}
 
-	/// Runs what asks, and answers; a test failure if nothing asks.
-	/// @return what is asked.
+	/// Runs what asks, and answers, with yes where that is no answer and with m_SaveAs where a name is wanted; a test
+	/// failure if nothing asks.
+	/// @return what is asked, a line for each question.
 	QString Answer(QMessageBox::StandardButton i_Button, const std::function<void()>& i_rAsk)
 	{
 		QString asked;
@@ -127,12 +134,17 @@ protected:
 		QObject::connect(&timer, &QTimer::timeout,
 		    [&]
 		    {
-			    auto* const pBox = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+			    QWidget* const pDialog = QApplication::activeModalWidget();
+			    if (qobject_cast<QFileDialog*>(pDialog))
+			    {
+				    pDialog->findChild<QLineEdit*>("fileNameEdit")->setText(m_SaveAs);
+				    QMetaObject::invokeMethod(pDialog, "accept");
+			    }
+			    auto* const pBox = qobject_cast<QMessageBox*>(pDialog);
 			    if (!pBox)
 				    return;
-			    timer.stop();
-			    asked = pBox->text();
-			    pBox->button(i_Button)->click();
+			    asked += (asked.isEmpty() ? "" : "\n") + pBox->text();
+			    (pBox->button(i_Button) ? pBox->button(i_Button) : pBox->button(QMessageBox::Yes))->click();
 		    });
 		timer.start(0);
 		i_rAsk();
@@ -145,6 +157,7 @@ protected:
 	QAction& Action(const char* i_pName) { return *m_pWindow->findChild<QAction*>(i_pName); }
 
 	std::unique_ptr<VStudioWindow> m_pWindow;
+	QString m_SaveAs;
 	/// What was shown while files hung over the window.
 	QString m_Marked;
 	VMessages m_Messages;
@@ -358,6 +371,14 @@ TEST_F(Window, AsksBeforeUnsavedChangesAreLost)
 	EXPECT_TRUE(m_pWindow->close()) << "nothing has changed yet";
 
 	m_pWindow->show();
+	RunEvents();
+	// What was set just now counts, though nothing has heard of it.
+	const QString asked = "performer.qrr has changes that are not saved.";
+	EXPECT_EQ(Parameters()->Find("TargetScale")->SetValueText("2"), "");
+	EXPECT_EQ(Answer(QMessageBox::Discard, [&] { m_pWindow->Open(target); }), asked);
+	RunEvents();
+	EXPECT_EQ(Parameters()->Find("TargetScale")->SetValueText("3"), "");
+	EXPECT_EQ(Answer(QMessageBox::Cancel, [&] { m_pWindow->close(); }), asked);
 	QMetaObject::invokeMethod(&Document(), "RemoveUnnecessaryJoints");
 	const struct
 	{
@@ -369,8 +390,7 @@ TEST_F(Window, AsksBeforeUnsavedChangesAreLost)
 	for (const auto& rRow : rows)
 	{
 		m_pWindow->show();
-		EXPECT_EQ(Answer(rRow.m_Answer, [&] { EXPECT_EQ(m_pWindow->close(), rRow.m_bCloses); }),
-		    "performer.qrr has changes that are not saved.");
+		EXPECT_EQ(Answer(rRow.m_Answer, [&] { EXPECT_EQ(m_pWindow->close(), rRow.m_bCloses); }), asked);
 		EXPECT_EQ(ReadFile(target) != before, rRow.m_bSaves);
 	}
 	m_pWindow->show();
@@ -488,6 +508,13 @@ TEST_F(Window, AsksBeforeAnotherSubjectTakesThePlace)
 	edit();
 	EXPECT_EQ(Answer(QMessageBox::Discard, [&] { m_pWindow->Open(b); }),
 	    "The retarget subject has changes that are in no file.");
+	create();
+	edit();
+	m_SaveAs = Path("a");
+	EXPECT_EQ(Answer(QMessageBox::Save, [&] { m_pWindow->Open(b); }),
+	    "The retarget subject has changes that are in no file.\n"
+	    "a.qrr is there already. Do you want to replace it?");
+	EXPECT_FALSE(QFile::exists(m_SaveAs)) << "a name that no dialog shows";
 }
 
 TEST_F(Window, AFailedSaveIsShown)
