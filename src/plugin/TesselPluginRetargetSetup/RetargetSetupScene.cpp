@@ -9,8 +9,8 @@
 #include "RetargetSetupCore/Mirror.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
-#include "RetargetSetupCore/SideOfName.h"
 #include "RetargetSetupDocument/StaleSelection.h"
+#include "SetupProposal/Side.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "TesselPluginRetargetSetup/ManipulatorMove.h"
 #include "TesselPluginRetargetSetup/SideSeen.h"
@@ -98,10 +98,10 @@ QString VRetargetSetupScene::SideSeen(int i_CameraType) const
 	QVector4D left, right;
 	for (std::size_t i = 0; i < pSubject->m_Segments.size(); ++i)
 	{
-		const RetargetSetup::ESide side = RetargetSetup::SideOfName(pSubject->m_Segments[i].m_Name);
+		const SetupProposal::ESide side = SetupProposal::SideOfName(pSubject->m_Segments[i].m_Name);
 		QMatrix4x4 matrix;
-		if (side != RetargetSetup::ESide::None && GetItemTransform({TargetSegment(i)}, matrix))
-			(side == RetargetSetup::ESide::Left ? left : right) += matrix.column(3);
+		if (side != SetupProposal::ESide::None && GetItemTransform({TargetSegment(i)}, matrix))
+			(side == SetupProposal::ESide::Left ? left : right) += matrix.column(3);
 	}
 	if (left.w() == 0.0f || right.w() == 0.0f)
 		return {};
