@@ -428,13 +428,17 @@ TEST_F(Preview, SelectsLikeTheLists)
 		EXPECT_EVENTUALLY(ToolTip() == "Template : R_Tibia<br>Template : shinRight") << ToolTip().toStdString();
 		EXPECT_EVENTUALLY(rOperator.Shows("sceneToolTip", "character : shinRight\nperformer : R_Tibia"));
 		EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
-		const QStringList before = Selected();
-		rOperator.Key(Qt::Key_Escape);
-		EXPECT_EVENTUALLY(!Sees(shins.topLeft(), IsOrange));
-		rOperator.Release(Qt::LeftButton, shins.bottomRight(), modifiers);
-		EXPECT_EQ(Selected(), before);
-		rOperator.Press(Qt::LeftButton, shins.topLeft(), modifiers);
-		rOperator.Point(shins.bottomRight(), modifiers);
+		// Behind the preferences, where there is no window manager, no window has the keyboard.
+		if (modifiers)
+		{
+			const QStringList before = Selected();
+			rOperator.Key(Qt::Key_Escape);
+			EXPECT_EVENTUALLY(!Sees(shins.topLeft(), IsOrange));
+			rOperator.Release(Qt::LeftButton, shins.bottomRight(), modifiers);
+			EXPECT_EQ(Selected(), before);
+			rOperator.Press(Qt::LeftButton, shins.topLeft(), modifiers);
+			rOperator.Point(shins.bottomRight(), modifiers);
+		}
 		EXPECT_EVENTUALLY(Sees(shins.topLeft(), IsOrange));
 		rOperator.Release(Qt::LeftButton, shins.bottomRight(), modifiers);
 		EXPECT_EVENTUALLY(

@@ -242,8 +242,8 @@ constexpr VValue c_Values[] = {{"FILE", Files}, {"FILE...", Files}, {"FILE.qrs",
     {"FOLDER", Folders}, {"SRC:TGT", SourceAndTarget}, {"LEFT:RIGHT", TwoSides}, {"NAME|INDEX", RootBone},
     {"SEG=RX,RY,RZ[,TX,TY,TZ]", TargetSegment}, {"N", TargetIndex}, {"N=W", TargetAndValue},
     {"N=X,Y,Z", TargetAndValue}, {"CATEGORY=LEVEL", CategoryAndLevel}, {"X.Y", Versions}, {"S", Nothing},
-    {"WxH", Nothing}, {"V,V,...", Nothing}, {"UNIT", Nothing}, {"HZ", Nothing}, {"STACK", Nothing}, {"EXPR", Nothing},
-    {"NAME=EXPR", Nothing}, {"NAME=NUMBER", Nothing}};
+    {"WxH", Nothing}, {"V,V,...", Nothing}, {"UNIT", Nothing}, {"HZ", Nothing}, {"STACK", Nothing}, {"SCORE", Nothing},
+    {"DEGREES", Nothing}, {"MM", Nothing}, {"EXPR", Nothing}, {"NAME=EXPR", Nothing}, {"NAME=NUMBER", Nothing}};
 
 /// "bind|mean|tpose" are the words themselves.
 bool IsListOfWords(std::string_view i_Name)

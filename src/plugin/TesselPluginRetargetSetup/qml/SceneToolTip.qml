@@ -16,6 +16,8 @@ ToolTip {
 	y: scene ? scene.mousePos.y + 10 : 0
 	visible: text !== ""
 	delay: Theme.infoToolTipDelay
+	// Escape is the view's: it ends what the mouse is about.
+	closePolicy: Popup.NoAutoClose
 
 	contentItem: Text {
 		objectName: "sceneToolTip"

@@ -20,7 +20,8 @@ T.ToolTip {
 	// Never takes a press from what it covers.
 	enabled: false
 	delay: Theme.infoToolTipDelay
-	closePolicy: T.Popup.CloseOnEscape | T.Popup.CloseOnPressOutsideParent | T.Popup.CloseOnReleaseOutsideParent
+	// Escape is for what the tip is about.
+	closePolicy: T.Popup.CloseOnPressOutsideParent | T.Popup.CloseOnReleaseOutsideParent
 
 	contentItem: Text {
 		text: control.text
