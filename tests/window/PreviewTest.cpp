@@ -295,6 +295,15 @@ TEST_F(Preview, PicksWhatTheMouseIsOn)
 		m_pOperator->Point(place);
 		EXPECT_EVENTUALLY(Sees(place, IsYellow)) << axis;
 	}
+
+	// The menu is for what is pointed at.
+	const QPointF shin = PointAtBone("shinRight", "hockRight");
+	m_pOperator->Press(Qt::RightButton, shin);
+	m_pOperator->Release(Qt::RightButton, shin);
+	EXPECT_EVENTUALLY(m_pOperator->Shows("menuSelectpartner", "Select partner"));
+	EXPECT_TRUE(Selected("targetSegments", "shinRight"));
+	m_pOperator->Click("menuSelectpartner");
+	EXPECT_EVENTUALLY(Selected("targetSegments", "shinLeft"));
 }
 
 TEST_F(Preview, FixedViewsTellWhichSideTheyShow)
