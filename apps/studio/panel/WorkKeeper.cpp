@@ -4,6 +4,7 @@
 #include "studio/panel/RetargetPanel.h"
 
 #include <QFileInfo>
+#include <QWidget>
 
 #include <utility>
 

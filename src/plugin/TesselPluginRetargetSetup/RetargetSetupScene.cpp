@@ -78,7 +78,7 @@ QVariantMap VRetargetSetupScene::ViewOptions()
 std::vector<ISelectionItem> VRetargetSetupScene::ItemsToFrame() const
 {
 	std::vector<ISelectionItem> items;
-	const auto add = [&](const VRetargetSetup::VSubjectValues& i_rValues, std::uint32_t i_Kind)
+	const auto add = [&](const VRetargetSetupCore::VSubjectValues& i_rValues, std::uint32_t i_Kind)
 	{
 		if (i_rValues.m_pParametrised)
 			for (std::uint32_t i = 0; i < i_rValues.m_pParametrised->m_Segments.size(); ++i)
@@ -190,7 +190,7 @@ void VRetargetSetupScene::RefreshScene()
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pPosed;
 	m_pSubjectTransform->Transform(pPosed, pFrame, 0);
 	SetFrame(pPosed);
-	const auto appears = [](const VRetargetSetup::VSubjectValues& i_rValues, bool& io_rbShown)
+	const auto appears = [](const VRetargetSetupCore::VSubjectValues& i_rValues, bool& io_rbShown)
 	{
 		const bool bShown = i_rValues.m_pParametrised && !i_rValues.m_pParametrised->m_Segments.empty();
 		return !std::exchange(io_rbShown, bShown) && bShown;
