@@ -105,7 +105,7 @@ function(retarget_test name)
 	endif()
 	# XCB copies texts that do not end in a zero, with their length: the strict checks take that for an overflow.
 	set_tests_properties(${name} PROPERTIES ENVIRONMENT
-		"QT_QPA_PLATFORM=xcb;LIBGL_ALWAYS_SOFTWARE=1;ASAN_OPTIONS=detect_leaks=1;LSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/display.supp:print_suppressions=0;${threads}")
+		"QT_QPA_PLATFORM=xcb;LIBGL_ALWAYS_SOFTWARE=1;ASAN_OPTIONS=detect_leaks=1;${threads}")
 endfunction()
 
 # retarget_long_test(NAME SECONDS): begins before shorter ones, so that it does not run alone at the end.

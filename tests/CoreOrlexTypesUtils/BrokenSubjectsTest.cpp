@@ -23,12 +23,7 @@ using namespace CoreOrlexTypesUtils::SubjectParametrisedUtils;
 using namespace CoreOrlexTypesUtils::RigidBodyUtils;
 using CoreOrlexTypes::VSubjectApplicationData;
 
-/// Sanitizers look at each; without them a part is enough.
-#ifdef RETARGET_SANITIZED
-constexpr int c_SubjectCount = 100000;
-#else
 constexpr int c_SubjectCount = 20000;
-#endif
 
 /// Small subjects in which every size, index, type, number and expression may be wrong, and often is right.
 class VSubjectGenerator
