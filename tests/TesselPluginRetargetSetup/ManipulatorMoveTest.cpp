@@ -76,16 +76,16 @@ TEST(ManipulatorMove, JointFrameIsTheParentsPlaceThenTheSegmentsOwn)
 TEST(ManipulatorMove, TheRootMovesAndTurnsAndOthersOnlyTurn)
 {
 	VSubjectParametrised subject = Subject();
-	EXPECT_TRUE(RetargetSetup::MoveSegment(subject, 0, Place(5, 6, 1007, 90), Frame(0), true, Frame));
+	EXPECT_TRUE(RetargetSetup::MoveSegment(subject, 0, Place(5, 6, 1007, 90), Frame(0), {}, Frame));
 	ExpectNear(subject.m_Segments[0].m_Joint.m_BindPose, {0, 0, c_Quarter, 5, 6, 7});
 	EXPECT_EQ(subject.m_Segments[0].m_Joint.m_Mean, subject.m_Segments[0].m_Joint.m_BindPose);
 	ExpectNear(subject.m_Segments[1].m_Joint.m_BindPose, {0.125, 0.125, 0.125});
 
-	EXPECT_TRUE(RetargetSetup::MoveSegment(subject, 1, Place(999, 6, 1007, 90, {1, 0, 0}), Frame(1), false, Frame));
+	EXPECT_TRUE(RetargetSetup::MoveSegment(subject, 1, Place(999, 6, 1007, 90, {1, 0, 0}), Frame(1), {}, Frame));
 	ExpectNear(subject.m_Segments[1].m_Joint.m_BindPose, {c_Quarter, 0, 0});
 	ExpectNear(subject.m_Segments[2].m_Joint.m_BindPose, {});
 
-	EXPECT_FALSE(RetargetSetup::MoveSegment(subject, 3, {}, {}, true, Frame));
+	EXPECT_FALSE(RetargetSetup::MoveSegment(subject, 3, {}, {}, {2}, Frame));
 }
 
 TEST(ManipulatorMove, TheOtherSideIsMirroredAcrossThePlaneBetweenTheJoints)
@@ -107,7 +107,7 @@ TEST(ManipulatorMove, TheOtherSideIsMirroredAcrossThePlaneBetweenTheJoints)
 		SCOPED_TRACE(rCase.m_pName);
 		VSubjectParametrised subject = Subject();
 		ASSERT_TRUE(
-		    RetargetSetup::MoveSegment(subject, 1, Place(200, 0, 1400, 90, rCase.m_Axis), Frame(1), true, Frame));
+		    RetargetSetup::MoveSegment(subject, 1, Place(200, 0, 1400, 90, rCase.m_Axis), Frame(1), {2}, Frame));
 		ExpectNear(subject.m_Segments[2].m_Joint.m_BindPose, rCase.m_Mirrored);
 		EXPECT_EQ(subject.m_Segments[2].m_Joint.m_Mean, subject.m_Segments[2].m_Joint.m_BindPose);
 	}
@@ -118,8 +118,7 @@ TEST(ManipulatorMove, TheMirrorIsMeasuredInTheOtherJointsOwnFrame)
 	const auto turnedFrame = [](std::size_t i_Segment)
 	{ return i_Segment == 2 ? Place(-200, 0, 1400, 90) : Frame(i_Segment); };
 	VSubjectParametrised subject = Subject();
-	ASSERT_TRUE(
-	    RetargetSetup::MoveSegment(subject, 1, Place(200, 0, 1400, 90, {1, 0, 0}), Frame(1), true, turnedFrame));
+	ASSERT_TRUE(RetargetSetup::MoveSegment(subject, 1, Place(200, 0, 1400, 90, {1, 0, 0}), Frame(1), {2}, turnedFrame));
 	// The world's X axis is the negative Y axis of a frame that is turned by a quarter about Z.
 	ExpectNear(subject.m_Segments[2].m_Joint.m_BindPose, {0, -c_Quarter, 0});
 }
@@ -170,20 +169,15 @@ double MissedMirror(
 	Eigen::Isometry3d dragged = from;
 	dragged.linear() = turn * from.linear();
 	VSubjectParametrised subject = *i_rAtRest.m_pParametrised;
-	RetargetSetup::MoveSegment(
-	    subject, i_Segment, ToQt(dragged), ToQt(from), true,
+	const bool bMirrorsChange = i_bByRule
+	    && !RetargetSetup::AreMirrorImages(*i_rAtRest.m_pParametrised, *i_rAtRest.m_pSubject, i_Segment, i_Mirror);
+	RetargetSetup::MoveSegment(subject, i_Segment, ToQt(dragged), ToQt(from), {std::int32_t(i_Mirror), bMirrorsChange},
 	    [&](std::size_t i_Index)
 	    {
 		    const VSubject::VSegment& rSegment = i_rAtRest.m_pSubject->m_Segments[i_Index];
 		    const std::uint32_t parent = rSegment.m_ParentSegmentIndex;
 		    return RetargetSetup::JointFrame(
 		        parent == CoreOrlexTypes::c_NoParent ? QMatrix4x4() : ToQt(Isometry(atRest[parent])), rSegment);
-	    },
-	    [&](std::size_t i_Other)
-	    {
-		    return i_bByRule
-		        && !RetargetSetup::AreMirrorImages(
-		            *i_rAtRest.m_pParametrised, *i_rAtRest.m_pSubject, i_Segment, i_Other);
 	    });
 	const Eigen::Vector3d normal = between.normalized();
 	const Eigen::Matrix3d mirror = Eigen::Matrix3d::Identity() - 2.0 * normal * normal.transpose();

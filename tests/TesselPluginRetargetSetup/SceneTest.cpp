@@ -169,6 +169,18 @@ TEST_F(Scene, MirrorsTheChangeWhereTheHostWantsIt)
 		EXPECT_LT(drag(), 0.02f);
 		EXPECT_EQ(TakeLog().find("mirrors what changes in a pose") != std::string::npos, i == 0) << "told once";
 	}
+	auto renamed = Target();
+	renamed.m_Segments[arm].m_Name = "bras gauche";
+	renamed.m_Segments[other].m_Name = "bras droit";
+	m_pDocument->SetTargetSubject(std::move(renamed), *m_pDocument->TargetValues().m_pApplicationData, {});
+	for (const bool bBySides : {false, true})
+	{
+		pApplication->m_Rules.m_bPartnersBySides = bBySides;
+		SelectSegment(arm);
+		const std::vector<double> before = Target().m_Segments[other].m_Joint.m_BindPose;
+		drag();
+		EXPECT_EQ(Target().m_Segments[other].m_Joint.m_BindPose != before, bBySides);
+	}
 	NVX::GlobalLog::Category("RetargetSetup").SetLevel(NVX::ELogWarning);
 }
 

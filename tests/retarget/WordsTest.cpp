@@ -120,7 +120,8 @@ TEST(Side, StandsInAWordOfItsOwn)
 	for (const auto& [pName, side] : {std::pair{"LeftArm", Left}, {"upperArmRight", Right}, {"RThumb", Right},
 	         {"lThigh", Left}, {"thumb_01_l", Left}, {"Bip01 L UpperArm", Left}, {"Character1_RightArm", Right},
 	         {"Lefthand", Left}, {"RIGHT_ARM", Right}, {"toe.R.001", Right}, {"Left:Spine", None}, {"Spine", None},
-	         {"collar", None}, {"bright", None}, {"LR", None}, {"LeftRightMid", None}, {"", None},
+	         {"collar", None}, {"bright", None}, {"LR", None}, {"l_to_r", None}, {"Rigleft:Hips", None},
+	         {"UpperLeg", None}, {"Neck_lower", None}, {"l", Left}, {"arm.L", Left}, {"LeftRightMid", None}, {"", None},
 	         {"bras_gauche", Left}, {"Hand_rechts", Right}, {"右腕", Right}})
 		EXPECT_EQ(SetupProposal::SideOfName(pName), side) << pName;
 }

@@ -3,6 +3,7 @@
 #include "studio/qmltypes/Ownership.h"
 #include "studio/qmltypes/SelectionManager.h"
 #include "studio/qmltypes/SelectionWatcher.h"
+#include "studio/qmltypes/Side.h"
 
 #include <QQmlEngine>
 #include <QtQml>
@@ -60,6 +61,8 @@ void RegisterTypes()
 	qmlRegisterType<VSelectionWatcher>("Orlex.Selection", 1, 0, "SelectionWatcher");
 	qmlRegisterSingletonType<VOwnership>(
 	    "Orlex.Controls", 1, 0, "Ownership", [](QQmlEngine*, QJSEngine*) -> QObject* { return new VOwnership; });
+	qmlRegisterSingletonType<VSide>(
+	    "Orlex.Controls", 1, 0, "Side", [](QQmlEngine*, QJSEngine*) -> QObject* { return new VSide; });
 	qmlRegisterSingletonType<VTesselParameters>(
 	    "Orlex.Tessel.Parameters", 1, 0, "TesselParameters", Singleton<&VEngineServices::m_Parameters>);
 	qmlRegisterSingletonType<VTessel>("TesselQML", 1, 0, "Tessel", Singleton<&VEngineServices::m_Tessel>);

@@ -246,12 +246,14 @@ bool VWriter::WriteText(const VSubjectParametrised& i_rSubject, const VSubjectAp
 
 std::uint32_t VWriter::Write(const boost::filesystem::path& i_rPath, const VSubjectParametrised& i_rSubject,
     const VSubjectApplicationData& i_rApplicationData, const VSubjectQRTExtras& i_rExtras, std::uint32_t i_VersionValue,
-    std::vector<std::string>* o_pErrors)
+    std::vector<std::string>* o_pErrors, const std::function<bool(const std::string& i_rText)>& i_rMayStand)
 {
 	std::string text;
 	std::vector<std::string> errors;
 	std::vector<std::string> warnings;
-	if (WriteText(i_rSubject, i_rApplicationData, i_rExtras, i_VersionValue, text, errors, warnings))
+	const bool bWhole = WriteText(i_rSubject, i_rApplicationData, i_rExtras, i_VersionValue, text, errors, warnings);
+	const bool bStands = bWhole && (!i_rMayStand || i_rMayStand(text));
+	if (bStands)
 	{
 		std::string reason;
 		const std::uint32_t status = UtilsFileSystem::SaveFile(i_rPath, text, reason);
@@ -267,7 +269,7 @@ std::uint32_t VWriter::Write(const boost::filesystem::path& i_rPath, const VSubj
 	else
 		for (const std::string& rError : errors)
 			NVX_LOG("QRTIO", NVX::ELogError, "%1%", rError);
-	return errors.empty() ? NVX::Status::c_Success : NVX::Status::c_WriteFailure;
+	return bStands && errors.empty() ? NVX::Status::c_Success : NVX::Status::c_WriteFailure;
 }
 
 } // namespace CoreOrlexQRTIO

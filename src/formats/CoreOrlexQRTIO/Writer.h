@@ -6,6 +6,7 @@
 
 #include <boost/filesystem/path.hpp>
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -22,11 +23,13 @@ class VWriter
 public:
 	/// Replaces the file only when the whole text stands on disk: after a failure the file is what it was.
 	/// @param i_VersionValue a value that stands for no version writes everything, which no reader takes back.
+	/// @param i_rMayStand is shown the whole text; where it returns false, nothing is written and no error added.
 	/// @return 0, or 0x80000020 on failure. Errors go to o_pErrors, without it to the log category "QRTIO", where
 	/// warnings always go.
 	std::uint32_t Write(const boost::filesystem::path& i_rPath, const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
 	    const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData, const VSubjectQRTExtras& i_rExtras,
-	    std::uint32_t i_VersionValue, std::vector<std::string>* o_pErrors = nullptr);
+	    std::uint32_t i_VersionValue, std::vector<std::string>* o_pErrors = nullptr,
+	    const std::function<bool(const std::string& i_rText)>& i_rMayStand = {});
 
 	/// The text of the file. Empty, and false, if there was an error.
 	bool WriteText(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,

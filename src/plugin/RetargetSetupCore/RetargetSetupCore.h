@@ -116,6 +116,9 @@ public:
 	/// or if its FBX file is not the one that was read last.
 	const std::string& PoseNote() const { return m_PoseNote; }
 
+	/// The segment on the other side, by the host's rule; -1 for none.
+	std::int32_t PartnerOf(const VSubjectValues& i_rValues, std::size_t i_SegmentIndex) const;
+
 	/// Index into the FBX skeleton; takes effect with the next CreateTargetSubject.
 	/// @param i_bChosen false for a default, with which it is told that the file has other root bones.
 	void SetTargetRootIndex(std::uint32_t i_RootIndex, bool i_bChosen = true);

@@ -106,18 +106,13 @@ std::optional<std::size_t> DigestOf(const boost::filesystem::path& i_rPath)
 
 /// Reads the file that is about to be written, in memory, and tells what would not come back.
 /// @return false if it could not be read at all, so that it must not replace a file that can.
-bool ReadsBack(
-    const VSubjectRecord& i_rRecord, const CoreOrlexQRTIO::VSubjectQRTExtras& i_rExtras, std::string& o_rReason)
+bool ReadsBack(const VSubjectRecord& i_rRecord, std::string i_Text, std::string& o_rReason)
 {
-	std::string text;
 	std::vector<std::string> errors;
 	std::vector<std::string> warnings;
-	if (!CoreOrlexQRTIO::VWriter().WriteText(i_rRecord.m_SubjectParametrised, i_rRecord.m_SubjectApplicationData,
-	        i_rExtras, CoreOrlexQRTIO::c_AutomaticVersion, text, errors, warnings))
-		return true; // What cannot be written is told by the writing itself.
 	VSubjectRecord read;
 	CoreOrlexQRTIO::VSubjectQRTExtras extras;
-	if (!CoreOrlexQRTIO::VReader().ReadText(std::move(text), i_rRecord.m_SubjectParametrised.m_Name,
+	if (!CoreOrlexQRTIO::VReader().ReadText(std::move(i_Text), i_rRecord.m_SubjectParametrised.m_Name,
 	        i_rRecord.m_SubjectParametrised.m_SubjectId, read.m_SubjectParametrised, read.m_SubjectApplicationData,
 	        extras, errors, warnings))
 	{
@@ -317,11 +312,12 @@ std::uint32_t VRetargetSetupCore::Save(const boost::filesystem::path& i_rPath, s
 	if (!target.m_pParametrised || !target.m_pApplicationData)
 		return NVX::Status::c_NothingToActOn;
 	TellNamesUsedTwice(*target.m_pParametrised);
-	if (!ReadsBack({*target.m_pParametrised, *target.m_pApplicationData}, m_TargetExtras, o_rReason))
-		return NVX::Status::c_WriteFailure;
 	std::vector<std::string> errors;
 	const std::uint32_t status = CoreOrlexQRTIO::VWriter().Write(i_rPath, *target.m_pParametrised,
-	    *target.m_pApplicationData, m_TargetExtras, CoreOrlexQRTIO::c_AutomaticVersion, &errors);
+	    *target.m_pApplicationData, m_TargetExtras, CoreOrlexQRTIO::c_AutomaticVersion, &errors,
+	    [&](const std::string& i_rText) {
+		    return ReadsBack({*target.m_pParametrised, *target.m_pApplicationData}, i_rText, o_rReason);
+	    });
 	for (const std::string& rError : errors)
 	{
 		NVX_LOG("QRTIO", NVX::ELogError, "%1%", rError);

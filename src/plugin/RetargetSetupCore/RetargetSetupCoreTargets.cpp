@@ -76,6 +76,16 @@ const VComputeSubjectFK* VRetargetSetupCore::SourceKinematics()
 	return m_pSourceFK.get();
 }
 
+std::int32_t VRetargetSetupCore::PartnerOf(const VSubjectValues& i_rValues, std::size_t i_SegmentIndex) const
+{
+	if (!i_rValues.m_pParametrised || !i_rValues.m_pSubject
+	    || i_SegmentIndex >= i_rValues.m_pSubject->m_Segments.size())
+		return -1;
+	return HostRules().m_bPartnersBySides
+	    ? RetargetSetup::FindPartner(*i_rValues.m_pParametrised, *i_rValues.m_pSubject, i_SegmentIndex)
+	    : RetargetSetup::FindMirrorSegment(*i_rValues.m_pParametrised, i_SegmentIndex);
+}
+
 void VRetargetSetupCore::AddTarget(
     int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry)
 {
@@ -116,14 +126,8 @@ void VRetargetSetupCore::AddTarget(
 	addPair(sourceIndex, targetIndex);
 	if (i_bSymmetry)
 	{
-		const bool bBySides = HostRules().m_bPartnersBySides;
-		const auto partner = [&](const VSubjectValues& i_rValues, std::size_t i_Index)
-		{
-			return bBySides ? RetargetSetup::FindPartner(*i_rValues.m_pParametrised, *i_rValues.m_pSubject, i_Index)
-			                : RetargetSetup::FindMirrorSegment(*i_rValues.m_pParametrised, i_Index);
-		};
-		const std::int32_t sourceMirror = partner(source, sourceIndex);
-		const std::int32_t targetMirror = partner(target, targetIndex);
+		const std::int32_t sourceMirror = PartnerOf(source, sourceIndex);
+		const std::int32_t targetMirror = PartnerOf(target, targetIndex);
 		if (sourceMirror == -1)
 			TellNoPartner(*source.m_pParametrised, sourceIndex, "source");
 		if (targetMirror == -1)

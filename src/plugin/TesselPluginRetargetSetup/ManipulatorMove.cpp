@@ -84,8 +84,7 @@ void PoseMirrorSegment(VSubjectParametrised::VSegment& io_rMirrorSegment, const 
 }
 
 bool MoveSegment(VSubjectParametrised& io_rSubject, std::size_t i_SegmentIndex, const QMatrix4x4& i_rWorld,
-    const QMatrix4x4& i_rOrigin, bool i_bSymmetry, const std::function<QMatrix4x4(std::size_t)>& i_rJointFrame,
-    const std::function<bool(std::size_t)>& i_rMirrorsChange)
+    const QMatrix4x4& i_rOrigin, const VMirror& i_rMirror, const std::function<QMatrix4x4(std::size_t)>& i_rJointFrame)
 {
 	if (i_SegmentIndex >= io_rSubject.m_Segments.size())
 		return false;
@@ -93,12 +92,12 @@ bool MoveSegment(VSubjectParametrised& io_rSubject, std::size_t i_SegmentIndex, 
 	const QMatrix4x4 frame = i_rJointFrame(i_SegmentIndex);
 	const QMatrix4x4 before = frame * JointRotation(rSegment.m_Joint);
 	PoseSegment(rSegment, frame, i_rWorld, i_SegmentIndex == 0);
-	const std::int32_t mirror = i_bSymmetry ? FindMirrorSegment(io_rSubject, i_SegmentIndex) : -1;
-	if (mirror == -1)
+	const auto mirror = std::size_t(i_rMirror.m_SegmentIndex);
+	if (mirror >= io_rSubject.m_Segments.size())
 		return true;
-	VSubjectParametrised::VSegment& rMirror = io_rSubject.m_Segments[std::size_t(mirror)];
-	const QMatrix4x4 mirrorFrame = i_rJointFrame(std::size_t(mirror));
-	if (i_rMirrorsChange && i_rMirrorsChange(std::size_t(mirror)))
+	VSubjectParametrised::VSegment& rMirror = io_rSubject.m_Segments[mirror];
+	const QMatrix4x4 mirrorFrame = i_rJointFrame(mirror);
+	if (i_rMirror.m_bMirrorsChange)
 		PoseMirrorSegment(
 		    rMirror, before, i_rWorld, i_rOrigin, mirrorFrame, mirrorFrame * JointRotation(rMirror.m_Joint));
 	else

@@ -6,6 +6,7 @@
 #include <QMatrix4x4>
 
 #include <cstddef>
+#include <cstdint>
 #include <functional>
 
 /// What a drag of the manipulator does to the bind pose of a target subject. Matrices are for column vectors, in mm.
@@ -34,14 +35,20 @@ void PoseMirrorSegment(CoreOrlexTypes::VSubjectParametrised::VSegment& io_rMirro
     const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, const QMatrix4x4& i_rMirrorJointFrame,
     const QMatrix4x4& i_rMirrorFrom);
 
-/// The whole of a drag: poses the segment and, with symmetry, the one on the other side if there is one.
+/// What a drag does to the other side.
+struct VMirror
+{
+	/// The segment that moves too, -1 for none.
+	std::int32_t m_SegmentIndex = -1;
+	/// It takes over the change of the pose, not the pose.
+	bool m_bMirrorsChange = false;
+};
+
+/// The whole of a drag: poses the segment and the one on the other side.
 /// @param i_rJointFrame the joint frame of a segment by its index.
-/// @param i_rMirrorsChange tells of the segment on the other side whether it takes over the change of the pose; without
-/// it the pose itself is mirrored.
 /// @return false, with no change, for a segment that is not there.
 bool MoveSegment(CoreOrlexTypes::VSubjectParametrised& io_rSubject, std::size_t i_SegmentIndex,
-    const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, bool i_bSymmetry,
-    const std::function<QMatrix4x4(std::size_t)>& i_rJointFrame,
-    const std::function<bool(std::size_t)>& i_rMirrorsChange = {});
+    const QMatrix4x4& i_rWorld, const QMatrix4x4& i_rOrigin, const VMirror& i_rMirror,
+    const std::function<QMatrix4x4(std::size_t)>& i_rJointFrame);
 
 } // namespace RetargetSetup

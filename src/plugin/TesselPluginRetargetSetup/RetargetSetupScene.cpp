@@ -145,11 +145,8 @@ unsigned int VRetargetSetupScene::SelectPointedAt()
 
 int VRetargetSetupScene::PartnerOf(bool i_bSource, int i_SegmentIndex) const
 {
-	const auto pSubject =
-	    (i_bSource ? m_pRetargetSetup->SourceValues() : m_pRetargetSetup->TargetValues()).m_pParametrised;
-	return pSubject && std::size_t(i_SegmentIndex) < pSubject->m_Segments.size()
-	    ? RetargetSetup::FindMirrorSegment(*pSubject, std::size_t(i_SegmentIndex))
-	    : -1;
+	return m_pRetargetSetup->PartnerOf(
+	    i_bSource ? m_pRetargetSetup->SourceValues() : m_pRetargetSetup->TargetValues(), std::size_t(i_SegmentIndex));
 }
 
 void VRetargetSetupScene::OnShared()
@@ -318,26 +315,34 @@ void VRetargetSetupScene::ComputeJointFrame(
 	o_rMatrix = RetargetSetup::JointFrame(parent, rSegment);
 }
 
-bool VRetargetSetupScene::MirrorsChange(std::size_t i_SegmentIndex, std::size_t i_MirrorIndex)
+RetargetSetup::VMirror VRetargetSetupScene::MirrorOf(std::size_t i_SegmentIndex)
 {
+	if (!m_pRetargetSetup->JointSymmetry())
+		return {};
 	const VRetargetSetupCore::VSubjectValues& rAtRest = m_pRetargetSetup->TargetAtRest();
-	if (!m_pRetargetSetup->HostRules().m_bMirrorChange || !rAtRest.m_pParametrised || !rAtRest.m_pSubject)
-		return false;
-	VMirrorRule& rRule = m_MirrorRule;
-	if (rRule.m_pAtRest == rAtRest.m_pParametrised && rRule.m_SegmentIndex == i_SegmentIndex)
-		return rRule.m_bMirrorsChange;
-	rRule.m_bTold = rRule.m_bTold && rRule.m_pAtRest == rAtRest.m_pParametrised;
-	rRule.m_pAtRest = rAtRest.m_pParametrised;
-	rRule.m_SegmentIndex = i_SegmentIndex;
-	rRule.m_bMirrorsChange =
-	    !RetargetSetup::AreMirrorImages(*rAtRest.m_pParametrised, *rAtRest.m_pSubject, i_SegmentIndex, i_MirrorIndex);
-	if (rRule.m_bMirrorsChange && !std::exchange(rRule.m_bTold, true))
-		NVX_LOG("RetargetSetup", NVX::ELogInformation,
-		    "The joints of '%1%' and '%2%' are no mirror images of each other at rest: joint symmetry mirrors what "
-		    "changes in a pose, not the whole pose",
-		    rAtRest.m_pParametrised->m_Segments[i_SegmentIndex].m_Name,
-		    rAtRest.m_pParametrised->m_Segments[i_MirrorIndex].m_Name);
-	return rRule.m_bMirrorsChange;
+	const TesselPluginInterface::VHostRules rules = m_pRetargetSetup->HostRules();
+	const bool bSameCharacter = m_MirrorRule && m_MirrorRule->m_pAtRest == rAtRest.m_pParametrised;
+	if (bSameCharacter && m_MirrorRule->m_SegmentIndex == i_SegmentIndex
+	    && m_MirrorRule->m_bPartnersBySides == rules.m_bPartnersBySides
+	    && m_MirrorRule->m_bMirrorChange == rules.m_bMirrorChange)
+		return m_MirrorRule->m_Mirror;
+	bool bTold = bSameCharacter && m_MirrorRule->m_bTold;
+	RetargetSetup::VMirror mirror{m_pRetargetSetup->PartnerOf(rAtRest, i_SegmentIndex)};
+	if (rules.m_bMirrorChange && mirror.m_SegmentIndex != -1)
+	{
+		const auto partner = std::size_t(mirror.m_SegmentIndex);
+		mirror.m_bMirrorsChange =
+		    !RetargetSetup::AreMirrorImages(*rAtRest.m_pParametrised, *rAtRest.m_pSubject, i_SegmentIndex, partner);
+		if (mirror.m_bMirrorsChange && !std::exchange(bTold, true))
+			NVX_LOG("RetargetSetup", NVX::ELogInformation,
+			    "The joints of '%1%' and '%2%' are no mirror images of each other at rest: joint symmetry mirrors what "
+			    "changes in a pose, not the whole pose",
+			    rAtRest.m_pParametrised->m_Segments[i_SegmentIndex].m_Name,
+			    rAtRest.m_pParametrised->m_Segments[partner].m_Name);
+	}
+	m_MirrorRule.emplace(VMirrorRule{
+	    rAtRest.m_pParametrised, i_SegmentIndex, rules.m_bPartnersBySides, rules.m_bMirrorChange, mirror, bTold});
+	return mirror;
 }
 
 void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
@@ -355,15 +360,13 @@ void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
 		    index != CoreOrlexTypes::c_NoParent && !GetItemTransform({TargetSegment(index)}, parent))
 			return;
 	const QMatrix4x4 origin = RenderManipulator() ? RenderManipulator()->GivenTransform() : i_rMatrix;
-	RetargetSetup::MoveSegment(
-	    subject, segment, i_rMatrix, origin, m_pRetargetSetup->JointSymmetry(),
+	RetargetSetup::MoveSegment(subject, segment, i_rMatrix, origin, MirrorOf(segment),
 	    [&](std::size_t i_SegmentIndex)
 	    {
 		    QMatrix4x4 frame;
 		    ComputeJointFrame(frame, *target.m_pSubject, i_SegmentIndex);
 		    return frame;
-	    },
-	    [&](std::size_t i_MirrorIndex) { return MirrorsChange(segment, i_MirrorIndex); });
+	    });
 	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject));
 	RefreshScene();
 }

@@ -5,12 +5,14 @@
 #include "Flow2Graphics/FlowScene.h"
 #include "NVX/Shared.h"
 #include "TesselPluginInterface/IItemFactory.h"
+#include "TesselPluginRetargetSetup/ManipulatorMove.h"
 
 #include <QMatrix4x4>
 #include <QVariantMap>
 
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -102,16 +104,19 @@ private:
 	void OnManipulatorPressed();
 	/// The pose is what it was at the press.
 	void OnManipulatorCancelled();
-	/// Whether the segment on the other side takes over the change of a pose rather than the pose: where the host's
-	/// rules want it, and the two are no mirror images of each other at rest. Told once for a character.
-	bool MirrorsChange(std::size_t i_SegmentIndex, std::size_t i_MirrorIndex);
+	/// With joint symmetry, what moves with a segment; it takes over the change of a pose rather than the pose where
+	/// the host's rules want it and the two are no mirror images of each other at rest, which is told once for a
+	/// character.
+	RetargetSetup::VMirror MirrorOf(std::size_t i_SegmentIndex);
 
-	/// The answer of MirrorsChange for one segment of one character, which a drag asks for again and again.
+	/// The answer of MirrorOf for one segment of one character, which a drag asks for again and again.
 	struct VMirrorRule
 	{
 		std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pAtRest;
 		std::size_t m_SegmentIndex = 0;
-		bool m_bMirrorsChange = false;
+		bool m_bPartnersBySides = false;
+		bool m_bMirrorChange = false;
+		RetargetSetup::VMirror m_Mirror;
 		bool m_bTold = false;
 	};
 
@@ -131,5 +136,5 @@ private:
 	std::uint64_t m_PressedSubject = 0;
 	/// -1 while the manipulator is hidden.
 	std::int64_t m_ManipulatedSegment = -1;
-	VMirrorRule m_MirrorRule;
+	std::optional<VMirrorRule> m_MirrorRule;
 };

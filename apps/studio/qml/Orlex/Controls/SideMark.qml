@@ -1,4 +1,5 @@
 import QtQuick 2.15
+import Orlex.Controls 1.0
 import Orlex.Theme 1.0
 
 // A small "L" or "R" beside a name of the left or the right side; nothing beside any other.
@@ -6,18 +7,7 @@ Rectangle {
 	id: mark
 
 	property string name: ""
-	// "L", "R" or empty.
-	readonly property string side: sideOf(name)
-
-	function sideOf(name) {
-		// A word of its own ("LeftArm", "arm_l", "L_Arm"), behind any name space.
-		const plain = name.slice(name.lastIndexOf(":") + 1)
-		const words = plain.replace(/([a-z0-9])([A-Z])/g, "$1 $2").replace(/([A-Z])([A-Z][a-z])/g, "$1 $2").toLowerCase()
-			.split(/[^a-z]+/)
-		const left = words.some(word => word === "l" || word === "left")
-		const right = words.some(word => word === "r" || word === "right")
-		return left === right ? "" : left ? "L" : "R"
-	}
+	readonly property string side: Side.of(name)
 
 	visible: side !== ""
 	implicitWidth: 13
