@@ -4,9 +4,8 @@
 #include "retarget/subject/Mapping.h"
 #include "retarget/subject/Session.h"
 #include "retarget/text/Output.h"
+#include "retarget/text/PoseFindings.h"
 #include "retarget/text/Table.h"
-
-#include "SetupProposal/PoseCheck.h"
 
 #include <cmath>
 #include <unistd.h>
@@ -68,20 +67,6 @@ VJson ToJson(const VMapped& i_rMapped)
 	return json;
 }
 
-VJson ToJson(const std::vector<SetupProposal::VPoseFinding>& i_rFindings)
-{
-	VJson list = VJson::array();
-	for (const auto& rFinding : i_rFindings)
-	{
-		VJson numbers = VJson::object();
-		for (const auto& [pName, value] : rFinding.m_Numbers)
-			numbers[pName] = std::round(1e4 * value) / 1e4;
-		list.push_back({{"id", rFinding.m_pId}, {"fine", rFinding.m_bFine}, {"message", rFinding.m_Message},
-		    {"numbers", numbers}, {"options", rFinding.m_Options}});
-	}
-	return list;
-}
-
 std::string KindOf(const VProposedPair& i_rPair)
 {
 	std::string text;
@@ -135,19 +120,6 @@ std::string ToText(const VMapped& i_rMapped)
 	return text;
 }
 
-std::string ToText(const std::vector<SetupProposal::VPoseFinding>& i_rFindings)
-{
-	std::string text;
-	for (const auto& rFinding : i_rFindings)
-	{
-		text += std::string(rFinding.m_bFine ? "  fine  " : "  look  ") + rFinding.m_pId + ": "
-		    + Printable(rFinding.m_Message) + "\n";
-		if (!rFinding.m_Options.empty())
-			text += "        " + Printable(rFinding.m_Options) + "\n";
-	}
-	return text.empty() ? text : "\nAt rest, with the options of create and edit that mend it\n" + text;
-}
-
 EExitStatus Map(const VMapSettings& i_rSettings)
 {
 	if (i_rSettings.m_Fbx.empty() == i_rSettings.m_Subject.empty())
@@ -163,8 +135,8 @@ EExitStatus Map(const VMapSettings& i_rSettings)
 	const VMapped mapped = i_rSettings.m_Fbx.empty() ? ProposeForSubject(session) : ProposeForFile(session);
 	const auto findings = SetupProposal::CheckPose(mapped.m_Source, mapped.m_Target, mapped.m_Proposal);
 	VJson json = ToJson(mapped);
-	json["pose"] = ToJson(findings);
-	PrintResult(json, ToText(mapped) + ToText(findings));
+	json["pose"] = PoseJson(findings);
+	PrintResult(json, ToText(mapped) + PoseText(findings));
 	return EFine;
 }
 

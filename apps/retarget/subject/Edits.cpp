@@ -3,6 +3,7 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Suggest.h"
+#include "retarget/subject/Aligning.h"
 #include "retarget/subject/Mapping.h"
 #include "retarget/text/InputFile.h"
 
@@ -180,7 +181,7 @@ void SetState(VSession& io_rSession, const std::string& i_rValue)
 
 void SetScale(VSession& io_rSession, const std::string& i_rValue)
 {
-	const double scale = ParseFinite(i_rValue, "--scale");
+	const double scale = i_rValue == "fit" ? ScaleThatFits(io_rSession) : ParseFinite(i_rValue, "--scale");
 	if (!(scale > 0.0))
 		throw VCommandError(EWrongUsage, "--scale: a scale must be above 0: " + i_rValue);
 	io_rSession.Document().SetTargetScale(scale);
@@ -224,21 +225,6 @@ void Pose(VSession& io_rSession, const std::string& i_rValue)
 	io_rSession.Document().SetTargetSubjectParametrised(subject);
 }
 
-/// What was told of a pose that is now the file's.
-void ForgetPoseWarnings()
-{
-	ForgetMessages(
-	    [](const std::string& i_rCategory, const std::string& i_rText)
-	    {
-		    for (const auto& [pCategory, pBegin] :
-		        {std::pair{"RetargetSetup", "Root bone '"}, {"RetargetSetup", "Removing joints changed the bind pose"},
-		            {c_pCategory, "The bind pose as built differs"}, {c_pCategory, "--prune-joints after"}})
-			    if (i_rCategory == pCategory && i_rText.starts_with(pBegin))
-				    return true;
-		    return false;
-	    });
-}
-
 void MoveRoot(VSession& io_rSession, const char* i_pEdit, const std::function<void(Rotation::VPose<double>&)>& i_rMove)
 {
 	VSubjectParametrised subject = io_rSession.Target();
@@ -265,9 +251,12 @@ void Lift(VSession& io_rSession, const std::string& i_rMm)
 
 void MatchFilePose(VSession& io_rSession, const std::string&)
 {
-	io_rSession.Document().MatchFilePose();
-	io_rSession.m_bMatched = true;
-	ForgetPoseWarnings();
+	io_rSession.MatchFilePose();
+}
+
+void Align(VSession& io_rSession, const std::string&)
+{
+	AlignTarget(io_rSession);
 }
 
 void UpdateTargets(VSession& io_rSession, const std::string&)
@@ -307,7 +296,10 @@ constexpr VEditKind c_Kinds[] = {
     {"--state", "N=X,Y,Z",
         "Give target N the offset X,Y,Z: mm at the present scale (position) or an angle-axis in radians (rotation)",
         SetState},
-    {"--scale", "S", "Scale all lengths of the target subject: 1 is the size in the file", SetScale},
+    {"--scale", "S",
+        "Scale all lengths of the target subject: 1 is the size in the file, fit brings the hips to the height of the "
+        "source's",
+        SetScale},
     {"--create-joints", nullptr, "Give every segment without a joint a ball joint", CreateJoints},
     {"--prune-joints", nullptr, "Remove the joints of segments that carry no target", PruneJoints},
     {"--pose", "SEG=RX,RY,RZ[,TX,TY,TZ]",
@@ -317,6 +309,16 @@ constexpr VEditKind c_Kinds[] = {
         "Turn the target subject in its bind pose about the vertical through its root, to the left as seen from above",
         Turn},
     {"--lift", "MM", "Lift the root of the target subject in its bind pose; negative lowers it", Lift},
+    {"--align", nullptr,
+        "Bring the bind pose of the target subject to the source's: each segment that a target ties points where the "
+        "source's points, the whole faces where the source faces, and the feet stand on the floor; then measure all "
+        "offsets again. A subject that stands as it was made takes the pose of the FBX file first",
+        Align},
+    {"--lock", "SEGMENT", "From here on, --align leaves the joint of the target segment SEGMENT as it is", LockSegment},
+    {"--chain", "arms|legs|spine|all",
+        "From here on, --align reaches only the arms, the legs, or the spine with neck, pelvis and facing (at first "
+        "all)",
+        ChooseChain},
     {"--match-file-pose", nullptr,
         "Set all bind poses so that the segments stand as the bones do in the FBX file; belongs after --prune-joints",
         MatchFilePose, true},

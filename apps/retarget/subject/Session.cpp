@@ -26,6 +26,21 @@ namespace CommandLine
 namespace
 {
 
+/// What was told of a pose that is now the file's.
+void ForgetPoseWarnings()
+{
+	ForgetMessages(
+	    [](const std::string& i_rCategory, const std::string& i_rText)
+	    {
+		    for (const auto& [pCategory, pBegin] :
+		        {std::pair{"RetargetSetup", "Root bone '"}, {"RetargetSetup", "Removing joints changed the bind pose"},
+		            {c_pCategory, "The bind pose as built differs"}, {c_pCategory, "--prune-joints after"}})
+			    if (i_rCategory == pCategory && i_rText.starts_with(pBegin))
+				    return true;
+		    return false;
+	    });
+}
+
 std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_rSkeleton)
 {
 	VElements bones{"bone", {}};
@@ -116,9 +131,17 @@ void VSession::Report(const std::string& i_rPath) const
 	const auto joints = std::ranges::count_if(rSubject.m_Segments,
 	    [](const auto& i_rSegment)
 	    { return i_rSegment.m_Joint.m_JointType != CoreOrlexTypes::VSubjectParametrised::VJoint::EDummy; });
-	PrintResult({{"output", i_rPath}, {"segments", rSubject.m_Segments.size()}, {"joints", joints},
-	                {"targets", rSubject.m_Targets.size()}},
-	    "");
+	VJson json{{"output", i_rPath}, {"segments", rSubject.m_Segments.size()}, {"joints", joints},
+	    {"targets", rSubject.m_Targets.size()}};
+	json.update(m_ReportJson);
+	PrintResult(json, i_rPath == c_pStandardStream ? "" : m_ReportText);
+}
+
+void VSession::MatchFilePose()
+{
+	m_pDocument->MatchFilePose();
+	m_bMatched = true;
+	ForgetPoseWarnings();
 }
 
 void VSession::ForgetNamelessFiles()

@@ -1,10 +1,12 @@
 #pragma once
 
 #include "retarget/subject/Elements.h"
+#include "retarget/text/Output.h"
 
 #include "InMemoryHost/Application.h"
 #include "InMemoryHost/Dispatcher.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
+#include "RetargetSetupCore/SourceAlignment.h"
 #include "SetupProposal/Proposal.h"
 #include "numerics/Rotation.h"
 
@@ -44,7 +46,8 @@ public:
 
 	/// What the document asks its host for.
 	TesselPluginInterface::VHostRules& Rules() { return m_pApplication->m_Rules; }
-	/// With --json: where the subject was saved and what it holds.
+	/// With --json where the subject was saved and what it holds; what edits have to tell, unless the subject itself
+	/// went to standard output.
 	void Report(const std::string& i_rPath) const;
 
 	VRetargetSetupCore& Document() { return *m_pDocument; }
@@ -57,6 +60,9 @@ public:
 	/// EWrongUsage, with what the source is needed for, if there is none.
 	const CoreOrlexTypes::VSubjectParametrised& Source(const std::string& i_rWhatFor) const;
 	const CoreOrlexTypes::VSubjectParametrised& Target() const;
+
+	/// Gives all bind poses of the file, and forgets what was told of the pose before.
+	void MatchFilePose();
 
 	/// Whether targets that are added get a mirrored partner; off at first, as in the panel.
 	bool m_bSymmetry = false;
@@ -73,6 +79,11 @@ public:
 	std::optional<std::size_t> m_Root;
 	/// The bind poses have been taken from the file.
 	bool m_bMatched = false;
+	/// What an alignment reaches.
+	RetargetSetup::VAlignmentChoice m_Alignment;
+	/// What edits add to the report.
+	VJson m_ReportJson = VJson::object();
+	std::string m_ReportText;
 
 private:
 	std::shared_ptr<InMemoryHost::VApplication> m_pApplication;

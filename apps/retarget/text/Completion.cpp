@@ -240,7 +240,7 @@ struct VValue
 constexpr VValue c_Values[] = {{"FILE", Files}, {"FILE...", Files}, {"FILE.qrs", Files}, {"FILE.qrr", Files},
     {"FILE.fbx", Files}, {"IN.qrr", Files}, {"OUT.qrr", Files}, {"OUT.png", Files}, {"IN... OUT", Files},
     {"FOLDER", Folders}, {"SRC:TGT", SourceAndTarget}, {"LEFT:RIGHT", TwoSides}, {"NAME|INDEX", RootBone},
-    {"SEG=RX,RY,RZ[,TX,TY,TZ]", TargetSegment}, {"N", TargetIndex}, {"N=W", TargetAndValue},
+    {"SEG=RX,RY,RZ[,TX,TY,TZ]", TargetSegment}, {"SEGMENT", TargetSegment}, {"N", TargetIndex}, {"N=W", TargetAndValue},
     {"N=X,Y,Z", TargetAndValue}, {"CATEGORY=LEVEL", CategoryAndLevel}, {"X.Y", Versions}, {"S", Nothing},
     {"WxH", Nothing}, {"V,V,...", Nothing}, {"UNIT", Nothing}, {"HZ", Nothing}, {"STACK", Nothing}, {"SCORE", Nothing},
     {"DEGREES", Nothing}, {"MM", Nothing}, {"EXPR", Nothing}, {"NAME=EXPR", Nothing}, {"NAME=NUMBER", Nothing}};

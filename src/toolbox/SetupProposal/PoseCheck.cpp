@@ -60,24 +60,10 @@ struct VBody
 		return sides == 0 ? std::nullopt : std::optional(sum / sides);
 	}
 
-	/// The lowest joint of the legs.
-	std::optional<std::size_t> Lowest() const
-	{
-		std::optional<std::size_t> lowest;
-		for (std::size_t i = 0; i < m_rSkeleton.size(); ++i)
-		{
-			const EBodyPart part = m_rReading.m_Joints[i].m_Part;
-			if ((part == EFoot || part == EToe)
-			    && (!lowest || m_rSkeleton[i].m_Place[2] < m_rSkeleton[*lowest].m_Place[2]))
-				lowest = i;
-		}
-		return lowest;
-	}
-
 	/// Of the thighs over the lowest joint of the legs: a pelvis may stand above them.
 	std::optional<double> HipHeight() const
 	{
-		const auto lowest = Lowest();
+		const auto lowest = LowestOfFeet(m_rSkeleton, m_rReading);
 		const auto left = Joint(EThigh, ESide::Left);
 		const auto right = Joint(EThigh, ESide::Right);
 		if (!lowest || !left || !right)
@@ -90,7 +76,8 @@ struct VBody
 
 std::string Rounded(double i_Value, double i_Step)
 {
-	std::string text = NumberText::PrintF(std::round(i_Value / i_Step) * i_Step);
+	// No zero with a sign.
+	std::string text = NumberText::PrintF(std::round(i_Value / i_Step) * i_Step + 0.0);
 	text.erase(text.find_last_not_of('0') + 1);
 	return text.ends_with('.') ? text.substr(0, text.size() - 1) : text;
 }
@@ -157,16 +144,16 @@ VPoseFinding Scale(double i_Source, double i_Target)
 	return finding;
 }
 
-VPoseFinding Floor(const VBody& i_rTarget, std::size_t i_Lowest, double i_HipHeight)
+VPoseFinding Floor(const VBody& i_rTarget, std::size_t i_Lowest)
 {
 	const VRestJoint& rLowest = i_rTarget.m_rSkeleton[i_Lowest];
 	const double height = rLowest.m_Place[2];
-	VPoseFinding finding{"floor", height <= c_FineAbove * i_HipHeight && height >= -c_FineBelow * i_HipHeight, "",
-	    {{"lowestMm", height}}, ""};
+	const double lift = LiftToFloor(i_rTarget.m_rSkeleton, i_rTarget.m_rReading);
+	VPoseFinding finding{"floor", lift == 0.0, "", {{"lowestMm", height}}, ""};
 	finding.m_Message = "The lowest joint of the character's feet, \"" + rLowest.m_Name + "\", stands "
 	    + Rounded(std::abs(height), 0.1) + " mm " + (height < 0.0 ? "below" : "above") + " the floor";
 	if (!finding.m_bFine)
-		finding.m_Options = "--lift " + Rounded(-height, 0.1) + " --update-targets";
+		finding.m_Options = "--lift " + Rounded(lift, 0.1) + " --update-targets";
 	return finding;
 }
 
@@ -206,8 +193,29 @@ std::vector<VPoseFinding> CheckPose(
 	if (sourceHips && targetHips)
 		findings.push_back(Scale(*sourceHips, *targetHips));
 	if (targetHips)
-		findings.push_back(Floor(target, *target.Lowest(), *targetHips));
+		findings.push_back(Floor(target, *LowestOfFeet(i_rTarget, i_rProposal.m_Target)));
 	return findings;
+}
+
+std::optional<std::size_t> LowestOfFeet(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody)
+{
+	std::optional<std::size_t> lowest;
+	for (std::size_t i = 0; i < i_rSkeleton.size(); ++i)
+	{
+		const EBodyPart part = i_rBody.m_Joints[i].m_Part;
+		if ((part == EFoot || part == EToe) && (!lowest || i_rSkeleton[i].m_Place[2] < i_rSkeleton[*lowest].m_Place[2]))
+			lowest = i;
+	}
+	return lowest;
+}
+
+double LiftToFloor(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody)
+{
+	const auto hips = VBody{i_rSkeleton, i_rBody}.HipHeight();
+	if (!hips)
+		return 0.0;
+	const double height = i_rSkeleton[*LowestOfFeet(i_rSkeleton, i_rBody)].m_Place[2];
+	return height <= c_FineAbove * *hips && height >= -c_FineBelow * *hips ? 0.0 : -height;
 }
 
 } // namespace SetupProposal

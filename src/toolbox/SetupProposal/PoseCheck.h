@@ -2,6 +2,7 @@
 
 #include "SetupProposal/Proposal.h"
 
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -26,5 +27,11 @@ struct VPoseFinding
 /// All of them that the two skeletons have the joints for, whether fine or not.
 std::vector<VPoseFinding> CheckPose(
     const VRestSkeleton& i_rSource, const VRestSkeleton& i_rTarget, const VProposal& i_rProposal);
+
+/// The lowest joint of the feet; nothing without feet.
+std::optional<std::size_t> LowestOfFeet(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody);
+
+/// What brings the feet to the floor, in mm; 0 if they stand on it.
+double LiftToFloor(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody);
 
 } // namespace SetupProposal

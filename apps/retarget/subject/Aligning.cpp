@@ -1,0 +1,146 @@
+#include "retarget/subject/Aligning.h"
+
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/text/PoseFindings.h"
+#include "retarget/text/Table.h"
+
+#include "DebugServices/GlobalLog.h"
+#include "RetargetSetupCore/RestSkeletons.h"
+
+#include <algorithm>
+#include <cmath>
+#include <string_view>
+#include <unistd.h>
+
+namespace CommandLine
+{
+namespace
+{
+
+using CoreOrlexTypes::VSubjectParametrised;
+using SetupProposal::VAlignment;
+
+/// Whether each joint that there still is stands as it did when the subject was made.
+bool StandsAsMade(const VSession& i_rSession, const VRetargetSetupCore& i_rDocument)
+{
+	const auto pAtRest = i_rDocument.TargetAtRest().m_pParametrised;
+	return pAtRest
+	    && std::ranges::equal(i_rSession.Target().m_Segments, pAtRest->m_Segments,
+	        [](const VSubjectParametrised::VSegment& i_rNow, const VSubjectParametrised::VSegment& i_rThen)
+	        {
+		        return i_rNow.m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy
+		            || i_rNow.m_Joint.m_BindPose == i_rThen.m_Joint.m_BindPose;
+	        });
+}
+
+/// To so many decimals, and never a zero with a sign.
+double Rounded(double i_Value, int i_Decimals)
+{
+	const double unit = std::pow(10.0, i_Decimals);
+	return std::round(unit * i_Value) / unit + 0.0;
+}
+
+VJson ToJson(
+    const VAlignment& i_rAlignment, const VSubjectParametrised& i_rSource, const VSubjectParametrised& i_rTarget)
+{
+	VJson joints = VJson::array();
+	for (const auto& rJoint : i_rAlignment.m_Joints)
+	{
+		joints.push_back({{"target", i_rTarget.m_Segments[rJoint.m_Target].m_Name},
+		    {"source", i_rSource.m_Segments[rJoint.m_Source].m_Name}, {"beforeDegrees", Rounded(rJoint.m_Before, 3)},
+		    {"afterDegrees", Rounded(rJoint.m_After, 3)}});
+		if (!rJoint.m_Note.empty())
+			joints.back()["note"] = rJoint.m_Note;
+	}
+	VJson refused = VJson::array();
+	for (const auto& rChain : i_rAlignment.m_Refused)
+		refused.push_back({{"chain", rChain.m_Chain}, {"reason", rChain.m_Reason}});
+	return {{"turnDegrees", Rounded(i_rAlignment.m_TurnDegrees, 3)}, {"liftMm", Rounded(i_rAlignment.m_LiftMm, 3)},
+	    {"joints", joints}, {"refused", refused}};
+}
+
+std::string ToText(
+    const VAlignment& i_rAlignment, const VSubjectParametrised& i_rSource, const VSubjectParametrised& i_rTarget)
+{
+	VTable table;
+	table.AddColumn("TARGET", VTable::ELeft);
+	table.AddColumn("SOURCE", VTable::ELeft);
+	table.AddColumn("BEFORE", VTable::ERight);
+	table.AddColumn("AFTER", VTable::ERight);
+	table.AddColumn("NOTE", VTable::ELeft);
+	for (const auto& rJoint : i_rAlignment.m_Joints)
+		table.AddRow({i_rTarget.m_Segments[rJoint.m_Target].m_Name, i_rSource.m_Segments[rJoint.m_Source].m_Name,
+		    Fixed(rJoint.m_Before, 1), Fixed(rJoint.m_After, 1), rJoint.m_Note});
+	return "Degrees between the directions of segments\n" + table.Text(HasColours(STDOUT_FILENO)) + "Turned by "
+	    + Fixed(Rounded(i_rAlignment.m_TurnDegrees, 1), 1) + " degrees as a whole, lifted by "
+	    + Fixed(Rounded(i_rAlignment.m_LiftMm, 1), 1) + " mm\n";
+}
+
+/// How source and target subject stand now.
+std::vector<SetupProposal::VPoseFinding> FindingsOf(VSession& io_rSession)
+{
+	const auto source = io_rSession.Document().SourceValues();
+	const auto target = io_rSession.Document().TargetValues();
+	const auto sourceRest = RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject);
+	const auto targetRest = RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject);
+	return SetupProposal::CheckPose(sourceRest, targetRest, SetupProposal::Propose(sourceRest, targetRest));
+}
+
+} // namespace
+
+void ChooseChain(VSession& io_rSession, const std::string& i_rChain)
+{
+	RetargetSetup::VAlignmentChoice& rChoice = io_rSession.m_Alignment;
+	const bool bAll = i_rChain == "all";
+	if (!bAll && i_rChain != "arms" && i_rChain != "legs" && i_rChain != "spine")
+		throw VCommandError(EWrongUsage, "--chain: a chain is arms, legs, spine or all, not \"" + i_rChain + "\"");
+	rChoice.m_bArms = bAll || i_rChain == "arms";
+	rChoice.m_bLegs = bAll || i_rChain == "legs";
+	rChoice.m_bSpine = bAll || i_rChain == "spine";
+	rChoice.m_bOthers = bAll;
+}
+
+void LockSegment(VSession& io_rSession, const std::string& i_rSegment)
+{
+	io_rSession.m_Alignment.m_Locked.insert(
+	    FindElement(i_rSegment, SegmentsOf(io_rSession.Target(), "target segment")));
+}
+
+void AlignTarget(VSession& io_rSession)
+{
+	const VSubjectParametrised& rSource = io_rSession.Source("--align");
+	VRetargetSetupCore& rDocument = io_rSession.Document();
+	if (StandsAsMade(io_rSession, rDocument) && rDocument.DifferenceFromFile())
+	{
+		NVX_LOG(c_pCategory, NVX::ELogInformation, "--align begins with the pose of the FBX file");
+		io_rSession.MatchFilePose();
+	}
+	const auto source = rDocument.SourceValues();
+	const auto target = rDocument.TargetValues();
+	std::string reason;
+	const auto aligned = RetargetSetup::AlignToSource(*source.m_pParametrised, *source.m_pSubject,
+	    *target.m_pParametrised, *target.m_pSubject, io_rSession.m_Alignment, reason);
+	if (!aligned)
+		throw VCommandError(EBadInput, "--align: " + reason);
+	rDocument.SetTargetSubjectParametrised(aligned->m_Subject);
+	for (const auto& rChain : aligned->m_Alignment.m_Refused)
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "--align: the %1% stays as it is: %2%", rChain.m_Chain, rChain.m_Reason);
+	io_rSession.m_ReportJson["aligned"] = ToJson(aligned->m_Alignment, rSource, aligned->m_Subject);
+	const auto findings = FindingsOf(io_rSession);
+	io_rSession.m_ReportJson["pose"] = PoseJson(findings);
+	io_rSession.m_ReportText += ToText(aligned->m_Alignment, rSource, aligned->m_Subject) + PoseText(findings);
+}
+
+double ScaleThatFits(VSession& io_rSession)
+{
+	io_rSession.Source("--scale fit");
+	for (const SetupProposal::VPoseFinding& rFinding : FindingsOf(io_rSession))
+		for (const auto& [pName, value] : rFinding.m_Numbers)
+			if (std::string_view(pName) == "scale")
+				return value * io_rSession.Document().GetTargetScale();
+	throw VCommandError(
+	    EFindings, "--scale fit: no hips and feet were found in both skeletons; --scale takes a number, too");
+}
+
+} // namespace CommandLine

@@ -1,0 +1,25 @@
+#pragma once
+
+#include "retarget/subject/Session.h"
+
+#include <string>
+
+/// The bind pose of the target subject, brought to the source's. All throw VCommandError to fail.
+namespace CommandLine
+{
+
+/// "--chain": from here on only what is told, "arms", "legs", "spine" or "all".
+void ChooseChain(VSession& io_rSession, const std::string& i_rChain);
+
+/// "--lock": a segment of the target subject that keeps its joint as it is.
+void LockSegment(VSession& io_rSession, const std::string& i_rSegment);
+
+/// "--align": with the angles before and after in what the session reports. Chains that would stand worse stay, which
+/// is a warning. A subject that stands as it was made takes the pose of its FBX file first.
+void AlignTarget(VSession& io_rSession);
+
+/// The scale with which the hips of the target subject stand as high above its feet as the source's. EFindings if one
+/// of the two has no hips or feet.
+double ScaleThatFits(VSession& io_rSession);
+
+} // namespace CommandLine
