@@ -8,7 +8,7 @@ set(RETARGET_WING_toolbox CoreOrlexTypesUtils SetupProposal)
 set(RETARGET_WING_formats UtilsRapidXml CoreOrlexQRTIO fbxsdk FBXIO TakeIO)
 set(RETARGET_WING_hostdata TesselDataStore TesselParameters TesselParametersGUI Flow2TypesUtils InMemoryHost)
 set(RETARGET_WING_scene CoreGraphics OrlexGraphics Flow2Graphics)
-set(RETARGET_WING_plugin RetargetSetupCore RetargetSetupDocument OrlexQtQuick TesselPluginRetargetSetup)
+set(RETARGET_WING_plugin RetargetSetupCore SetupReview RetargetSetupDocument OrlexQtQuick TesselPluginRetargetSetup)
 
 # Above them apps/: the programs may use every library, the first of these folders, and nothing of each other.
 set(RETARGET_PROGRAM_FOLDERS CommandLineText retarget studio)

@@ -125,8 +125,8 @@ VProgram MakeProgram(const VRender& i_rRender)
 	const auto addRender = [&](CLI::App& io_rProgram) { return AddRenderCommand(io_rProgram, i_rRender); };
 	using VAdd = std::function<VCommand(CLI::App&)>;
 	for (const VAdd& rAdd : {VAdd(AddCreateCommand), VAdd(AddEditCommand), VAdd(AddMapCommand), VAdd(AddTargetsCommand),
-	         VAdd(AddCheckCommand), VAdd(AddBonesCommand), VAdd(AddSegmentsCommand), VAdd(addRender),
-	         VAdd(AddFbxCommand), VAdd(AddTakeCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand),
+	         VAdd(AddCheckCommand), VAdd(AddDiffCommand), VAdd(AddBonesCommand), VAdd(AddSegmentsCommand),
+	         VAdd(addRender), VAdd(AddFbxCommand), VAdd(AddTakeCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand),
 	         VAdd(AddConvertCommand), VAdd(AddSchemaCommand), VAdd(AddEvalCommand), VAdd(AddDocumentationCommand)})
 		program.m_Commands.push_back(rAdd(rApp));
 	std::vector<CLI::App*> apps{&rApp};

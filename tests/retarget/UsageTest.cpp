@@ -58,6 +58,9 @@ TEST(Usage, WrongWords)
 	        "--size: \"64x9\" is not WIDTHxHEIGHT with 16 to 4096 pixels each"},
 	    {"size in words", {"render", "x.qrr", "-o", "x.png", "--size", "64x64x"}, 2, "", "is not WIDTHxHEIGHT"},
 	    {"view", {"render", "x.qrr", "-o", "x.png", "--view", "side"}, 2, "", "--view: there is no \"side\"; "},
+	    {"one file to compare", {"diff", c_Performer}, 2, "", "Give two files to compare, the earlier one first"},
+	    {"two files to describe", {"diff", "--describe", "a.qrr", "b.qrr"}, 2, "", "--describe tells what one file"},
+	    {"nothing to compare with", {"-q", "diff", c_Performer, "none.qrs"}, 3, "", "\"none.qrs\" could not be read"},
 	    {"empty name", {"targets", "x.qrr", "--source", ""}, 2, "", "--source: the text is empty: give a name, or"},
 	    {"state", {"fk", c_Performer, "--state", "1,2"}, 2, "", "take 67 numbers, not 2"},
 	});

@@ -18,6 +18,7 @@ VCommand AddFkCommand(CLI::App& io_rProgram);
 VCommand AddMapCommand(CLI::App& io_rProgram);
 VCommand AddTargetsCommand(CLI::App& io_rProgram);
 VCommand AddCheckCommand(CLI::App& io_rProgram);
+VCommand AddDiffCommand(CLI::App& io_rProgram);
 VCommand AddCreateCommand(CLI::App& io_rProgram);
 VCommand AddEditCommand(CLI::App& io_rProgram);
 VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender);

@@ -2,6 +2,7 @@
 
 #include "CoreOrlexQRTIO/SubjectQRTExtras.h"
 #include "CoreOrlexTypes/SubjectRecord.h"
+#include "SetupReview/compare/Comparison.h"
 
 #include <string>
 
@@ -16,11 +17,7 @@ inline constexpr const char* c_pSkeletonFileHelp =
     "Skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx); - is standard input";
 
 /// What a file of the skeleton family holds.
-struct VSubjectFile
-{
-	CoreOrlexTypes::VSubjectRecord m_Record;
-	CoreOrlexQRTIO::VSubjectQRTExtras m_Extras;
-};
+using VSubjectFile = SetupReview::VSetup;
 
 /// False if a skeleton file (.qrt, .qrk, .qrs, .qrr) could not be read, which is told; what could be read stands in the
 /// result all the same. Throws VCommandError with EBadInput for a legacy text file (.qrx) that fails.

@@ -237,13 +237,41 @@ struct VValue
 	VCandidates (*m_pCandidates)(const VTyped& i_rTyped, const std::string& i_rWord);
 };
 
-constexpr VValue c_Values[] = {{"FILE", Files}, {"FILE...", Files}, {"FILE.qrs", Files}, {"FILE.qrr", Files},
-    {"FILE.fbx", Files}, {"IN.qrr", Files}, {"OUT.qrr", Files}, {"OUT.png", Files}, {"IN... OUT", Files},
-    {"FOLDER", Folders}, {"SRC:TGT", SourceAndTarget}, {"LEFT:RIGHT", TwoSides}, {"NAME|INDEX", RootBone},
-    {"SEG=RX,RY,RZ[,TX,TY,TZ]", TargetSegment}, {"SEGMENT", TargetSegment}, {"N", TargetIndex}, {"N=W", TargetAndValue},
-    {"N=X,Y,Z", TargetAndValue}, {"CATEGORY=LEVEL", CategoryAndLevel}, {"X.Y", Versions}, {"S", Nothing},
-    {"WxH", Nothing}, {"V,V,...", Nothing}, {"UNIT", Nothing}, {"HZ", Nothing}, {"STACK", Nothing}, {"SCORE", Nothing},
-    {"DEGREES", Nothing}, {"MM", Nothing}, {"EXPR", Nothing}, {"NAME=EXPR", Nothing}, {"NAME=NUMBER", Nothing}};
+constexpr VValue c_Values[] = {
+    {"BEFORE AFTER", Files},
+    {"CATEGORY=LEVEL", CategoryAndLevel},
+    {"DEGREES", Nothing},
+    {"EXPR", Nothing},
+    {"FILE", Files},
+    {"FILE...", Files},
+    {"FILE.fbx", Files},
+    {"FILE.qrr", Files},
+    {"FILE.qrs", Files},
+    {"FOLDER", Folders},
+    {"HZ", Nothing},
+    {"IN... OUT", Files},
+    {"IN.qrr", Files},
+    {"LEFT:RIGHT", TwoSides},
+    {"MM", Nothing},
+    {"N", TargetIndex},
+    {"N=W", TargetAndValue},
+    {"N=X,Y,Z", TargetAndValue},
+    {"NAME=EXPR", Nothing},
+    {"NAME=NUMBER", Nothing},
+    {"NAME|INDEX", RootBone},
+    {"OUT.png", Files},
+    {"OUT.qrr", Files},
+    {"S", Nothing},
+    {"SCORE", Nothing},
+    {"SEG=RX,RY,RZ[,TX,TY,TZ]", TargetSegment},
+    {"SEGMENT", TargetSegment},
+    {"SRC:TGT", SourceAndTarget},
+    {"STACK", Nothing},
+    {"UNIT", Nothing},
+    {"V,V,...", Nothing},
+    {"WxH", Nothing},
+    {"X.Y", Versions},
+};
 
 /// "bind|mean|tpose" are the words themselves.
 bool IsListOfWords(std::string_view i_Name)

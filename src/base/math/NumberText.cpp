@@ -193,3 +193,13 @@ std::string NumberText::PrintF(double i_Value)
 	text.assign(buffer, result.ptr);
 	return text;
 }
+
+std::string NumberText::PrintShortest(double i_Value)
+{
+	std::string text;
+	if (AppendNotFinite(text, i_Value))
+		return text;
+	char buffer[32];
+	text.assign(buffer, std::to_chars(buffer, buffer + sizeof(buffer), i_Value).ptr);
+	return text;
+}

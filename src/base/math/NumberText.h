@@ -25,6 +25,9 @@ std::string PrintG17(double i_Value);
 /// As AppendG17 with another number of significant digits.
 void AppendG(std::string& io_rText, double i_Value, int i_Digits);
 
+/// The fewest digits that read back as the same double.
+std::string PrintShortest(double i_Value);
+
 /// Equals printf's "%f" byte for byte for finite values; the others as PrintG17.
 std::string PrintF(double i_Value);
 
