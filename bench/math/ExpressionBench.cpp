@@ -1,5 +1,6 @@
 // Expressions of the kinds that subjects hold, parsed and evaluated from their text each time: through the factory that
 // segments and targets use, and by muParser. The last rows show that a sum costs the same per term however long it is.
+#include "../../tests/math/OneNumber.h"
 #include "../Ratios.h"
 
 #include "math/MathFactorySimple.h"
@@ -11,18 +12,7 @@ namespace
 {
 
 using namespace Math;
-
-class VOneNumber final : public IVector
-{
-public:
-	explicit VOneNumber(double i_Value) : m_Value(i_Value) {}
-	std::size_t Size() const override { return 1; }
-	double Get(std::size_t) const override { return m_Value; }
-	void Assign(const double* i_pValues, std::size_t) override { m_Value = *i_pValues; }
-
-private:
-	double m_Value;
-};
+using MathTest::VOneNumber;
 
 class VValue final : public IMathResult
 {

@@ -1,4 +1,5 @@
 #include "math/MathParser.h"
+#include "OneNumber.h"
 #include "math/Limits.h"
 #include "math/MathFactorySimple.h"
 
@@ -10,18 +11,7 @@ namespace
 {
 
 using namespace Math;
-
-class VOneNumber final : public IVector
-{
-public:
-	explicit VOneNumber(double i_Value) : m_Value(i_Value) {}
-	std::size_t Size() const override { return 1; }
-	double Get(std::size_t) const override { return m_Value; }
-	void Assign(const double* i_pValues, std::size_t) override { m_Value = *i_pValues; }
-
-private:
-	double m_Value;
-};
+using MathTest::VOneNumber;
 
 class VCopy final : public IMathResult
 {
