@@ -1,7 +1,9 @@
 #include "Rows.h"
 
+#include <algorithm>
 #include <cmath>
 #include <optional>
+#include <sstream>
 
 namespace
 {
@@ -113,6 +115,63 @@ TEST(Take, ShowsWhatTheFileHolds)
 	    {"no take", {"take", Data("motion/README.md")}, 3, "", "could not be read as a take. It is neither a BVH"},
 	    {"missing", {"take", "nothing.bvh"}, 3, "", "\"nothing.bvh\" could not be read as a take."},
 	});
+}
+
+/// A character that is set up for the performer of a take, in the words of its file.
+TEST(Solve, PlaysATakeThroughASubject)
+{
+	const VScratchFolder folder;
+	const std::string take = Data("motion/chest_yxz_120fps.bvh");
+	EXPECT_EQ(RunJson({"performer", take, "-o", "p.qrs", "--json"}, folder).at("segments"), 23);
+	RunRows({{"no finding", {"check", "p.qrs", "--strict"}, 0, "no findings", ""}}, folder);
+	EXPECT_EQ(folder
+	              .Run({"create", "--fbx", c_Fbx, "--source", "p.qrs", "--auto", "--prune-joints", "--match-file-pose",
+	                  "--update-targets", "-o", "c.qrr", "-q"})
+	              .m_Status,
+	    0);
+	const VJson solved = RunJson({"solve", "c.qrr", "--take", take, "--source", "p.qrs", "--json"}, folder);
+	EXPECT_EQ(solved.at("frames"), 61);
+	EXPECT_EQ(solved.at("notConverged"), VJson::array());
+	EXPECT_NEAR(solved.at("scale").get<double>(), 1.0, 1e-6);
+	EXPECT_EQ(solved.at("feet").size(), 2u);
+	// The worst of a target, as the frames have it.
+	const std::string csv = folder.Run({"solve", "c.qrr", "--take", take, "--source", "p.qrs", "--csv"}).m_Out;
+	EXPECT_EQ(std::ranges::count(csv, '\n'), 62);
+	double worst = 0.0;
+	std::istringstream lines(csv);
+	for (std::string line; std::getline(lines, line);)
+		if (std::isdigit(line[0]))
+		{
+			std::string value;
+			std::istringstream values(line);
+			for (int i = 0; i < 5; ++i)
+				std::getline(values, value, ',');
+			worst = std::max(worst, std::stod(value));
+		}
+	EXPECT_NEAR(solved.at("targets")[0].at("max").get<double>(), worst, 1e-6);
+	const std::vector<std::string> solve{"solve", "c.qrr", "--take", take, "--source", "p.qrs"};
+	const auto with = [&](std::vector<std::string> i_More)
+	{
+		i_More.insert(i_More.begin(), solve.begin(), solve.end());
+		return i_More;
+	};
+	const std::vector<VRow> rows{
+	    {"range", with({"--frames", "10:19", "-q"}), 0, "Frames 10 to 19 at 120 Hz", ""},
+	    {"within", with({"--max-position", "1e6", "--max-rotation", "180", "-q"}), 0, "0 of 61 frames", ""},
+	    {"beyond", with({"--max-position", "0", "-q"}), 1, "Targets, how far",
+	        "Targets are off by more than they may: #"},
+	    {"beyond the take", with({"--frames", "10:61"}), 2, "", "the take has the frames 0 to 60, not 10 to 61"},
+	    {"no frames", with({"--frames", "ten"}), 2, "", "\"ten\" is not FIRST:LAST"},
+	    {"no rest", with({"--rest-frame", "61"}), 2, "", "The take has no frame 61"},
+	    {"no joint", with({"--joint", "Tail:Hips"}), 2, "", "The take has no joint \"Tail\""},
+	    {"no pair", with({"--joint", "Hips"}), 2, "", "\"Hips\" is not JOINT:SEGMENT"},
+	    {"two results", with({"--csv", "--json"}), 2, "", "--csv and --json both print the result"},
+	    {"no drawing", with({"--plot", "c.qrr"}), 2, "", "is an input that saving there would destroy"},
+	    {"no performer", {"performer", take, "-o", "p.bvh"}, 2, "", "let the name of its file end in .qrs"},
+	};
+	RunRows(rows, folder);
+	EXPECT_EQ(folder.Run(with({"--plot", "plot.svg"})).m_Status, 0);
+	EXPECT_TRUE(folder.Read("plot.svg").starts_with("<svg "));
 }
 
 TEST(Dump, SpellsAsTheSchemaDoes)

@@ -38,7 +38,7 @@ TEST(Usage, WrongWords)
 	    {"unknown option", {"dump", "--evaluatd", "x"}, 2, "",
 	        "error retarget: there is no option \"--evaluatd\"; did you mean \"--evaluated\"?"},
 	    {"option of another command", {"edit", "x", "--match-file-pose", "-o", "y"}, 2, "", "--match-file-pose"},
-	    {"not offered", {"solve", "x"}, 2, "", "error retarget: there is no command \"solve\"; see"},
+	    {"not offered", {"paint", "x"}, 2, "", "error retarget: there is no command \"paint\"; see"},
 	    {"too many", {"dump", "x", "y"}, 2, "", "error retarget: \"y\" is one argument too many; see"},
 	    {"missing file", {"dump"}, 2, "", "error retarget: FILE is missing; see \"retarget dump --help\""},
 	    {"missing output", {"create", "--fbx", c_Fbx}, 2, "", "error retarget: --output is missing; see"},

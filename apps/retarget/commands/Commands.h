@@ -11,6 +11,8 @@ VCommand AddSchemaCommand(CLI::App& io_rProgram);
 VCommand AddFbxCommand(CLI::App& io_rProgram);
 VCommand AddBonesCommand(CLI::App& io_rProgram);
 VCommand AddSegmentsCommand(CLI::App& io_rProgram);
+VCommand AddPerformerCommand(CLI::App& io_rProgram);
+VCommand AddSolveCommand(CLI::App& io_rProgram);
 VCommand AddTakeCommand(CLI::App& io_rProgram);
 VCommand AddDumpCommand(CLI::App& io_rProgram);
 VCommand AddConvertCommand(CLI::App& io_rProgram);

@@ -1,12 +1,10 @@
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
 #include "retarget/commands/Commands.h"
-#include "retarget/text/InputFile.h"
+#include "retarget/subject/TakeFile.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/Table.h"
 
-#include "TakeIO/Limits.h"
-#include "TakeIO/ReadTake.h"
 #include "math/NumberText.h"
 
 #include <algorithm>
@@ -20,12 +18,10 @@ namespace
 
 using namespace TakeIO;
 
-constexpr std::pair<const char*, double> c_Units[]{{"mm", 1.0}, {"cm", 10.0}, {"m", 1000.0}, {"inch", 25.4}};
-
 struct VTakeCommand
 {
 	std::string m_File;
-	VTakeSettings m_Settings;
+	std::shared_ptr<VTakeSettings> m_pSettings = std::make_shared<VTakeSettings>();
 };
 
 std::string SixDigits(double i_Number)
@@ -33,28 +29,6 @@ std::string SixDigits(double i_Number)
 	std::string text;
 	NumberText::AppendG(text, i_Number, 6);
 	return text;
-}
-
-/// Empty, or what is wrong with the text; so do the next.
-std::string ParseNumber(const std::string& i_rText, double i_Least, double i_Greatest, std::optional<double>& o_rNumber)
-{
-	double number = 0.0;
-	if (!NumberText::ScanWholeReal(i_rText, number) || !(number >= i_Least && number <= i_Greatest))
-		return "\"" + i_rText + "\" is no number from " + SixDigits(i_Least) + " to " + SixDigits(i_Greatest);
-	o_rNumber = number;
-	return {};
-}
-
-std::string ParseUnit(const std::string& i_rText, std::optional<double>& o_rUnit)
-{
-	const auto* const pFound =
-	    std::ranges::find_if(c_Units, [&i_rText](const auto& i_rUnit) { return i_rUnit.first == i_rText; });
-	if (pFound == std::end(c_Units))
-		return ParseNumber(i_rText, Limits::c_LeastUnit, Limits::c_GreatestUnit, o_rUnit).empty()
-		    ? std::string()
-		    : "\"" + i_rText + "\" is none of mm, cm, m, inch, and no number of millimetres";
-	o_rUnit = pFound->second;
-	return {};
 }
 
 const char* UpText(const VTake& i_rTake)
@@ -116,11 +90,7 @@ std::string TakeText(const VTake& i_rTake)
 
 EExitStatus ShowTake(const VTakeCommand& i_rCommand)
 {
-	VTake take;
-	std::string error;
-	if (!ReadTake(InputPath(i_rCommand.m_File, Limits::c_FileBytes).string(), i_rCommand.m_Settings, take, error))
-		throw VCommandError(EBadInput, "\"" + i_rCommand.m_File + "\" could not be read as a take. " + error);
-	RequireNoErrors();
+	const VTake take = ReadTakeFile(i_rCommand.m_File, *i_rCommand.m_pSettings);
 	PrintResult(TakeToJson(take), TakeText(take));
 	return EFine;
 }
@@ -137,34 +107,7 @@ VCommand AddTakeCommand(CLI::App& io_rProgram)
 	        "take walk.bvh --json | jq .rate"});
 	const auto pCommand = std::make_shared<VTakeCommand>();
 	pApp->add_option("FILE", pCommand->m_File, "Take: BVH or FBX file; - is standard input")->required();
-	pApp->add_option_function<std::string>(
-	        "--up",
-	        [pCommand](const std::string& i_rAxis) { pCommand->m_Settings.m_Up = i_rAxis == "y" ? EUp::Y : EUp::Z; },
-	        "The file's axis that points up: y or z; without it the one along which the skeleton reaches further")
-	    ->check(CLI::IsMember({"y", "z"}))
-	    ->option_text("y|z");
-	pApp->add_option_function<std::string>(
-	        "--stack", [pCommand](const std::string& i_rName) { pCommand->m_Settings.m_Stack = i_rName; },
-	        "Of an FBX file the animation stack of this name; without it the first")
-	    ->option_text("STACK");
-	const auto addNumber = [pApp](const char* i_pName, const char* i_pType, const char* i_pHelp, const auto& i_rParse)
-	{
-		pApp->add_option_function<std::string>(
-		        i_pName,
-		        [i_pName, i_rParse](const std::string& i_rText)
-		        {
-			        if (const std::string wrong = i_rParse(i_rText); !wrong.empty())
-				        throw CLI::ValidationError(i_pName, wrong);
-		        },
-		        i_pHelp)
-		    ->option_text(i_pType);
-	};
-	addNumber("--unit", "UNIT",
-	    "The file's unit: mm, cm, m, inch or a number of millimetres; without it the one that fits the hips",
-	    [pCommand](const std::string& i_rText) { return ParseUnit(i_rText, pCommand->m_Settings.m_Unit); });
-	addNumber("--rate", "HZ", "Frames a second that the take is brought to; without it the file's own",
-	    [pCommand](const std::string& i_rText)
-	    { return ParseNumber(i_rText, Limits::c_LeastRate, Limits::c_GreatestRate, pCommand->m_Settings.m_Rate); });
+	AddTakeOptions(*pApp, pCommand->m_pSettings);
 	return {pApp, [pCommand] { return ShowTake(*pCommand); }};
 }
 

@@ -59,6 +59,11 @@ bool BeginsSchema(std::string_view i_Head)
 	return RootElement(i_Head) == "schema";
 }
 
+bool BeginsDrawing(std::string_view i_Head)
+{
+	return RootElement(i_Head) == "svg";
+}
+
 bool BeginsPicture(std::string_view i_Head)
 {
 	return i_Head.starts_with("\x89PNG\r\n\x1A\n");
@@ -88,6 +93,8 @@ std::string Alternatives(const std::vector<std::string>& i_rTexts)
 
 const VOutputKind c_RetargetSubjectFile{"a retarget subject", {".qrr"}, BeginsSkeletonFile};
 const VOutputKind c_SkeletonFamilyFile{"a skeleton file", {".qrt", ".qrk", ".qrs", ".qrr"}, BeginsSkeletonFile};
+const VOutputKind c_PerformerFile{"a performer's skeleton", {".qrs"}, BeginsSkeletonFile};
+const VOutputKind c_DrawingFile{"an SVG drawing", {".svg"}, BeginsDrawing};
 const VOutputKind c_SchemaFile{"an XML schema", {".xsd"}, BeginsSchema};
 const VOutputKind c_PictureFile{"a PNG picture", {".png"}, BeginsPicture};
 

@@ -32,6 +32,8 @@ struct VOutputKind
 /// The four kinds of the skeleton family are one format: only their names tell them apart.
 extern const VOutputKind c_RetargetSubjectFile;
 extern const VOutputKind c_SkeletonFamilyFile;
+extern const VOutputKind c_PerformerFile;
+extern const VOutputKind c_DrawingFile;
 extern const VOutputKind c_SchemaFile;
 extern const VOutputKind c_PictureFile;
 

@@ -80,6 +80,7 @@ struct VComputeSubjectSolve::VImplementation
 		m_Frame.m_States = m_BindPose;
 		m_Frame.m_WorldPoses.resize(m_Kinematics.NumberOfSegments());
 		m_Frame.m_Residuals.resize(i_rSubject.m_Targets.size());
+		m_Frame.m_RangeShares.resize(m_Kinematics.NumberOfSegments(), 0.0);
 		std::size_t next = 0;
 		for (std::size_t i = 0; i < m_LeftOut.size(); ++i)
 			if (m_LeftOut[i].empty())
@@ -258,6 +259,7 @@ struct VComputeSubjectSolve::VImplementation
 		std::fill(m_Frame.m_Residuals.begin(), m_Frame.m_Residuals.end(), std::numeric_limits<double>::quiet_NaN());
 		for (const VSolvedTarget& rTarget : m_Targets)
 			m_Frame.m_Residuals[rTarget.m_Index] = Residual(rTarget, i_rObservations);
+		m_JointTerms.RangeShares(m_Frame.m_States, m_Frame.m_RangeShares);
 	}
 
 	std::vector<std::string> m_LeftOut;

@@ -37,6 +37,9 @@ struct VSolvedFrame
 	/// For each of the subject's targets mm, of rotations radians; of a rigid body the largest of its markers. NaN for
 	/// a target that is left out, or whose observation is missing.
 	std::vector<double> m_Residuals;
+	/// For each segment how far its joint is out in its range: 0 at the centring state, about 1 at the end. 0 without a
+	/// range, and of joints that are not solved for.
+	std::vector<double> m_RangeShares;
 	/// What SolveObjective.h says, at the states.
 	double m_Cost = 0.0;
 	/// Steps that were tried, those from the seed included.

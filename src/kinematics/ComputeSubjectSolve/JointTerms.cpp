@@ -83,6 +83,7 @@ VJointTerms::VJointTerms(
 		if (bSecond)
 			continue;
 		const auto& rSource = i_rSubject.m_Segments[rLink.m_Segment].m_Joint;
+		rJoint.m_Segment = rLink.m_Segment;
 		rJoint.m_State = states[rLink.m_Segment];
 		rJoint.m_Size = CoreOrlexTypes::StateSize(rSource.m_JointType);
 		rJoint.m_bRotation = rSource.m_JointType == VSubjectParametrised::VJoint::EBall
@@ -199,6 +200,16 @@ double VJointTerms::HalfCost(std::span<const double> i_States) const
 	ForEachTerm(i_States,
 	    [&](const VJoint&, const VMeasure&, const VVector6&, const VTerm& i_rTerm) { sum += i_rTerm.m_HalfCost; });
 	return sum;
+}
+
+void VJointTerms::RangeShares(std::span<const double> i_States, std::vector<double>& io_rShares) const
+{
+	for (const VJoint& rJoint : m_Joints)
+		if (rJoint.m_Range.m_bUsed)
+		{
+			const VVector6 deviation = Deviation(rJoint, rJoint.m_Range, i_States.data() + rJoint.m_State);
+			io_rShares[rJoint.m_Segment] = std::sqrt(deviation.dot(rJoint.m_Range.m_Weights * deviation));
+		}
 }
 
 void VJointTerms::AddTerms(

@@ -25,6 +25,10 @@ public:
 
 	double HalfCost(std::span<const double> i_States) const;
 
+	/// By segments how far the joint is out in its range: 0 at the centring state, 1 at the end. Joints that have none,
+	/// or are not solved for, are left as they are.
+	void RangeShares(std::span<const double> i_States, std::vector<double>& io_rShares) const;
+
 	/// Adds to the links' own Hessians and gradients, of which the first are sums of squares. What a prior or a range
 	/// says about two links of a joint together is left out of the Hessian, not of the gradient.
 	void AddTerms(
@@ -41,6 +45,7 @@ private:
 	};
 	struct VJoint
 	{
+		std::size_t m_Segment = 0;
 		std::size_t m_State = 0;
 		std::size_t m_Size = 0;
 		/// Whether it begins with an angle-axis vector, and whether all else are angles.

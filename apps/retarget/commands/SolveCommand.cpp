@@ -1,0 +1,291 @@
+#include "CommandLineText/Messages.h"
+#include "CommandLineText/Parsing.h"
+#include "retarget/commands/Commands.h"
+#include "retarget/subject/Session.h"
+#include "retarget/subject/SolvePlot.h"
+#include "retarget/subject/SolveText.h"
+#include "retarget/subject/TakeFile.h"
+#include "retarget/text/Output.h"
+#include "retarget/text/OutputFile.h"
+
+#include "ComputeSubjectFK/ConstructionException.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
+#include "CoreOrlexTypesUtils/joints/PoseVector.h"
+#include "DebugServices/GlobalLog.h"
+#include "NVX/Status.h"
+#include "TakeSolve/Performer.h"
+#include "UtilsFileSystem/Paths.h"
+#include "UtilsFileSystem/SaveFile.h"
+
+#include <charconv>
+#include <cstdio>
+#include <unistd.h>
+
+namespace CommandLine
+{
+namespace
+{
+
+using CoreOrlexTypes::VSubject;
+using CoreOrlexTypes::VSubjectParametrised;
+
+struct VSolveSettings
+{
+	std::string m_Subject;
+	std::string m_Take;
+	std::string m_Source;
+	std::shared_ptr<TakeIO::VTakeSettings> m_pTake = std::make_shared<TakeIO::VTakeSettings>();
+	std::optional<std::size_t> m_FirstFrame;
+	std::optional<std::size_t> m_LastFrame;
+	TakeSolve::VSourceSettings m_Pairs;
+	std::optional<double> m_MaximumPosition;
+	std::optional<double> m_MaximumRotation;
+	bool m_bCsv = false;
+	VOutput m_Plot;
+};
+
+/// A subject in numbers, with the states of its bind pose.
+struct VPosed
+{
+	explicit VPosed(const VSubjectParametrised& i_rSubject)
+	    : m_BindPose(CoreOrlexTypesUtils::PoseVector(i_rSubject, &VSubjectParametrised::VJoint::m_BindPose))
+	{
+		for (const auto& rFailure :
+		    CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertAllOfSubject(i_rSubject, m_Subject))
+			m_Subject.m_Targets[rFailure.m_Index].m_Type = VSubject::VTarget::EBadTargetType;
+	}
+	VSubject m_Subject;
+	std::vector<double> m_BindPose;
+};
+
+/// "A:B", where either may be left out, or one frame.
+std::string ParseFrames(const std::string& i_rText, VSolveSettings& io_rSettings)
+{
+	const auto parse = [](std::string_view i_Text, std::optional<std::size_t>& o_rFrame)
+	{
+		std::size_t frame = 0;
+		const auto [pEnd, error] = std::from_chars(i_Text.data(), i_Text.data() + i_Text.size(), frame);
+		if (error == std::errc() && pEnd == i_Text.data() + i_Text.size())
+			o_rFrame = frame;
+		return i_Text.empty() || o_rFrame.has_value();
+	};
+	const std::string_view text = i_rText;
+	const std::size_t colon = text.find(':');
+	const bool bFine = !text.empty() && parse(text.substr(0, colon), io_rSettings.m_FirstFrame)
+	    && parse(text.substr(colon == std::string::npos ? 0 : colon + 1), io_rSettings.m_LastFrame);
+	return bFine ? std::string() : "\"" + i_rText + "\" is not FIRST:LAST, two numbers of frames";
+}
+
+/// The last ":" splits, since names of joints may have a namespace.
+std::string ParseJoint(const std::string& i_rText, std::vector<TakeSolve::VNamedPair>& io_rPairs)
+{
+	const std::size_t colon = i_rText.rfind(':');
+	if (colon == std::string::npos || colon == 0 || colon + 1 == i_rText.size())
+		return "\"" + i_rText + "\" is not JOINT:SEGMENT";
+	io_rPairs.push_back({i_rText.substr(0, colon), i_rText.substr(colon + 1)});
+	return {};
+}
+
+/// On a terminal a bar that goes when the work is done; nothing elsewhere.
+class VProgressBar
+{
+public:
+	~VProgressBar()
+	{
+		if (m_Shown >= 0)
+			std::fputs("\r\x1b[K", stderr);
+	}
+	void Show(std::size_t i_Done, std::size_t i_All)
+	{
+		const int percent = int(100 * i_Done / i_All);
+		if (!m_bTerminal || percent == m_Shown)
+			return;
+		m_Shown = percent;
+		std::string bar(std::size_t(percent / 2), '#');
+		bar.resize(50, '.');
+		std::fprintf(stderr, "\r%s %3d %%", bar.c_str(), percent);
+	}
+
+private:
+	bool m_bTerminal = HasColours(STDERR_FILENO);
+	int m_Shown = -1;
+};
+
+std::size_t LastFrameOrRefuse(const VSolveSettings& i_rSettings, std::size_t i_Frames)
+{
+	const std::size_t first = i_rSettings.m_FirstFrame.value_or(0);
+	const std::size_t last = i_rSettings.m_LastFrame.value_or(i_Frames - 1);
+	if (first > last || last >= i_Frames)
+		throw VCommandError(EWrongUsage,
+		    "--frames: the take has the frames 0 to " + std::to_string(i_Frames - 1) + ", not " + std::to_string(first)
+		        + " to " + std::to_string(last));
+	return last;
+}
+
+VSubjectParametrised PerformerOf(const VSolveSettings& i_rSettings, VSession& io_rSession, const TakeIO::VTake& i_rTake)
+{
+	if (!i_rSettings.m_Source.empty())
+	{
+		io_rSession.LoadSource(i_rSettings.m_Source);
+		return io_rSession.Source("posing it");
+	}
+	std::vector<TakeSolve::VFinding> findings;
+	auto record = TakeSolve::MakePerformer(i_rTake, StemOf(i_rSettings.m_Take), findings);
+	for (const TakeSolve::VFinding& rFinding : findings)
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "%1%", rFinding.m_Message);
+	return std::move(record.m_SubjectParametrised);
+}
+
+/// The targets that are off by more than they may.
+std::string BeyondLimits(const VSolveSettings& i_rSettings, const VSolveResult& i_rResult)
+{
+	std::string text;
+	for (std::size_t i = 0; i < i_rResult.m_rReport.m_Targets.size(); ++i)
+	{
+		const VSubject::VTarget& rTarget = i_rResult.m_rTarget.m_Targets[i];
+		const TakeSolve::VTargetQuality& rQuality = i_rResult.m_rReport.m_Targets[i];
+		const auto& rLimit = IsRotationTarget(rTarget) ? i_rSettings.m_MaximumRotation : i_rSettings.m_MaximumPosition;
+		if (rLimit && UnitFactor(rTarget) * rQuality.m_Max > *rLimit)
+			text += (text.empty() ? "" : ", ") + ("#" + std::to_string(i)) + " \"" + i_rResult.m_TargetNames[i]
+			    + "\" in frame " + std::to_string(rQuality.m_MaxFrame);
+	}
+	return text;
+}
+
+EExitStatus Solve(const VSolveSettings& i_rSettings)
+{
+	if (i_rSettings.m_bCsv && JsonAsked())
+		throw VCommandError(EWrongUsage, "--csv and --json both print the result: give one of them");
+	if (!i_rSettings.m_Plot.m_Path.empty())
+		CheckOutput(
+		    i_rSettings.m_Plot, c_DrawingFile, {i_rSettings.m_Subject, i_rSettings.m_Take, i_rSettings.m_Source});
+
+	VSession session;
+	session.LoadTarget(i_rSettings.m_Subject);
+	const auto pTake = std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rSettings.m_Take, *i_rSettings.m_pTake));
+	const VPosed source(PerformerOf(i_rSettings, session, *pTake));
+	const VPosed target(session.Target());
+	RequireNoErrors();
+
+	std::string error;
+	const auto pMotion =
+	    TakeSolve::VSourceMotion::Make(source.m_Subject, source.m_BindPose, pTake, i_rSettings.m_Pairs, error);
+	if (!pMotion)
+		throw VCommandError(EWrongUsage, error);
+	const std::size_t last = LastFrameOrRefuse(i_rSettings, pTake->m_Frames);
+	if (target.m_Subject.m_Targets.empty())
+		throw VCommandError(EBadInput, "\"" + i_rSettings.m_Subject + "\" has no targets: there is nothing to solve");
+
+	std::optional<TakeSolve::VTakeSolve> solve;
+	try
+	{
+		solve.emplace(target.m_Subject, target.m_BindPose, pMotion);
+	}
+	catch (const ComputeSubject::VConstructionException&)
+	{
+		throw VCommandError(
+		    EBadInput, "\"" + i_rSettings.m_Subject + "\" has a joint without kinematics; retarget check tells which");
+	}
+	TakeSolve::VSolvedTake solved;
+	{
+		VProgressBar bar;
+		TakeSolve::SolveFrames(
+		    *solve, i_rSettings.m_FirstFrame.value_or(0), last,
+		    [&bar](std::size_t i_Solved, std::size_t i_Frames)
+		    {
+			    bar.Show(i_Solved, i_Frames);
+			    return true;
+		    },
+		    solved);
+	}
+	const TakeSolve::VSolveReport report = TakeSolve::ReportOn(target.m_Subject, target.m_BindPose, *pMotion, solved);
+	VSolveResult result{target.m_Subject, {}, *solve, solved, report};
+	const auto& rNamed = session.Document().TargetValues().m_pApplicationData->m_Targets;
+	for (std::size_t i = 0; i < target.m_Subject.m_Targets.size(); ++i)
+		result.m_TargetNames.push_back(i < rNamed.size() ? rNamed[i].m_Name : std::string());
+
+	if (!i_rSettings.m_Plot.m_Path.empty())
+	{
+		RequireNoErrors();
+		std::string reason;
+		if (UtilsFileSystem::SaveFile(
+		        UtilsFileSystem::PathFromUtf8(i_rSettings.m_Plot.m_Path), SolvePlot(result), reason)
+		    != NVX::Status::c_Success)
+			throw VCommandError(EBadOutput, reason);
+	}
+	if (i_rSettings.m_bCsv)
+		Print(SolveToCsv(result));
+	else
+		PrintResult(SolveToJson(result), JsonAsked() ? std::string() : SolveToText(result));
+	if (const std::string beyond = BeyondLimits(i_rSettings, result); !beyond.empty())
+		throw VCommandError(EFindings, "Targets are off by more than they may: " + beyond);
+	return EFine;
+}
+
+} // namespace
+
+VCommand AddSolveCommand(CLI::App& io_rProgram)
+{
+	CLI::App* const pApp = AddCommand(io_rProgram, "solve",
+	    "Play a take through a retarget subject and tell how far each target is off, and what an animator would look "
+	    "for: feet that slide or leave the floor, knees and elbows that bend otherwise, jumps, ends of ranges. The "
+	    "solve is our own stand-in: the host's may weigh things differently",
+	    {"solve hero.qrr --take walk.bvh --source performer.qrs",
+	        "solve hero.qrr --take walk.bvh --source performer.qrs --frames 1:200 --plot walk.svg",
+	        "solve hero.qrr --take walk.bvh --source performer.qrs --max-position 50 --max-rotation 20 -q",
+	        "solve hero.qrr --take walk.bvh --source performer.qrs --json | jq '.targets[] | {name, p95}'"});
+	const auto pSettings = std::make_shared<VSolveSettings>();
+	pApp->add_option("FILE.qrr", pSettings->m_Subject, "The retarget subject, or a legacy one (.qrx)")->required();
+	pApp->add_option("--take", pSettings->m_Take, "The performer's motion: BVH or FBX file")
+	    ->option_text("TAKE")
+	    ->required();
+	pApp->add_option("--source", pSettings->m_Source,
+	        "The performer's skeleton; without it one is made of the take, as \"retarget performer\" does")
+	    ->option_text("FILE.qrs")
+	    ->check(NotEmpty());
+	AddParsedOption(*pApp, "--frames", "FIRST:LAST", "Only these frames; the take's first is 0",
+	    [pSettings](const std::string& i_rText) { return ParseFrames(i_rText, *pSettings); });
+	pApp->add_option_function<std::vector<std::string>>(
+	        "--joint",
+	        [pSettings](const std::vector<std::string>& i_rTexts)
+	        {
+		        for (const std::string& rText : i_rTexts)
+			        if (const std::string wrong = ParseJoint(rText, pSettings->m_Pairs.m_Joints); !wrong.empty())
+				        throw CLI::ValidationError("--joint", wrong);
+	        },
+	        "The joint of the take drives this segment of the performer; any number of times. Without it names and the "
+	        "shape of the body tell")
+	    ->option_text("JOINT:SEGMENT")
+	    ->expected(1)
+	    ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+	AddParsedOption(*pApp, "--rest-frame", "FRAME",
+	    "In this frame the performer stands as in the bind pose. Without it the take's rest pose counts, each bone's "
+	    "direction brought onto the performer's",
+	    [pSettings](const std::string& i_rText)
+	    {
+		    std::optional<double> frame;
+		    const std::string wrong = ParseNumber(i_rText, 0.0, 1e9, frame);
+		    if (wrong.empty() && *frame != std::floor(*frame))
+			    return "\"" + i_rText + "\" is no number of a frame";
+		    if (wrong.empty())
+			    pSettings->m_Pairs.m_RestFrame = std::size_t(*frame);
+		    return wrong;
+	    });
+	AddTakeOptions(*pApp, pSettings->m_pTake);
+	AddParsedOption(*pApp, "--max-position", "MM",
+	    "Exit status 1, with their names, if a target is off by more in any frame",
+	    [pSettings](const std::string& i_rText)
+	    { return ParseNumber(i_rText, 0.0, 1e9, pSettings->m_MaximumPosition); });
+	AddParsedOption(*pApp, "--max-rotation", "DEG", "The same for rotations, in degrees",
+	    [pSettings](const std::string& i_rText)
+	    { return ParseNumber(i_rText, 0.0, 1e9, pSettings->m_MaximumRotation); });
+	pApp->add_flag("--csv", pSettings->m_bCsv,
+	    "Print a line for each frame instead: number, seconds, converged, iterations, and how far each target is off");
+	pApp->add_option("--plot", pSettings->m_Plot.m_Path, "Draw how far the targets are off over the frames")
+	    ->option_text("OUT.svg")
+	    ->check(NotEmpty());
+	AddForceOption(*pApp, pSettings->m_Plot);
+	return {pApp, [pSettings] { return Solve(*pSettings); }};
+}
+
+} // namespace CommandLine

@@ -1,0 +1,102 @@
+#include "retarget/subject/TakeFile.h"
+
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/text/InputFile.h"
+
+#include "TakeIO/Limits.h"
+#include "UtilsFileSystem/Paths.h"
+#include "math/NumberText.h"
+
+#include <algorithm>
+
+namespace CommandLine
+{
+namespace
+{
+
+using namespace TakeIO;
+
+constexpr std::pair<const char*, double> c_Units[]{{"mm", 1.0}, {"cm", 10.0}, {"m", 1000.0}, {"inch", 25.4}};
+
+std::string ParseUnit(const std::string& i_rText, std::optional<double>& o_rUnit)
+{
+	const auto* const pFound =
+	    std::ranges::find_if(c_Units, [&i_rText](const auto& i_rUnit) { return i_rUnit.first == i_rText; });
+	if (pFound == std::end(c_Units))
+		return ParseNumber(i_rText, Limits::c_LeastUnit, Limits::c_GreatestUnit, o_rUnit).empty()
+		    ? std::string()
+		    : "\"" + i_rText + "\" is none of mm, cm, m, inch, and no number of millimetres";
+	o_rUnit = pFound->second;
+	return {};
+}
+
+} // namespace
+
+std::string ParseNumber(const std::string& i_rText, double i_Least, double i_Greatest, std::optional<double>& o_rNumber)
+{
+	double number = 0.0;
+	if (!NumberText::ScanWholeReal(i_rText, number) || !(number >= i_Least && number <= i_Greatest))
+	{
+		std::string wrong = "\"" + i_rText + "\" is no number from ";
+		NumberText::AppendG(wrong, i_Least, 6);
+		NumberText::AppendG(wrong += " to ", i_Greatest, 6);
+		return wrong;
+	}
+	o_rNumber = number;
+	return {};
+}
+
+void AddParsedOption(CLI::App& io_rApp, const std::string& i_rName, const std::string& i_rType,
+    const std::string& i_rHelp, const std::function<std::string(const std::string&)>& i_rParse)
+{
+	io_rApp
+	    .add_option_function<std::string>(
+	        i_rName,
+	        [i_rName, i_rParse](const std::string& i_rText)
+	        {
+		        if (const std::string wrong = i_rParse(i_rText); !wrong.empty())
+			        throw CLI::ValidationError(i_rName, wrong);
+	        },
+	        i_rHelp)
+	    ->option_text(i_rType);
+}
+
+void AddTakeOptions(CLI::App& io_rApp, const std::shared_ptr<VTakeSettings>& i_rpSettings)
+{
+	io_rApp
+	    .add_option_function<std::string>(
+	        "--up",
+	        [i_rpSettings](const std::string& i_rAxis) { i_rpSettings->m_Up = i_rAxis == "y" ? EUp::Y : EUp::Z; },
+	        "The file's axis that points up: y or z; without it the one along which the skeleton reaches further")
+	    ->check(CLI::IsMember({"y", "z"}))
+	    ->option_text("y|z");
+	io_rApp
+	    .add_option_function<std::string>(
+	        "--stack", [i_rpSettings](const std::string& i_rName) { i_rpSettings->m_Stack = i_rName; },
+	        "Of an FBX file the animation stack of this name; without it the first")
+	    ->option_text("STACK");
+	AddParsedOption(io_rApp, "--unit", "UNIT",
+	    "The file's unit: mm, cm, m, inch or a number of millimetres; without it the one that fits the hips",
+	    [i_rpSettings](const std::string& i_rText) { return ParseUnit(i_rText, i_rpSettings->m_Unit); });
+	AddParsedOption(io_rApp, "--rate", "HZ", "Frames a second that the take is brought to; without it the file's own",
+	    [i_rpSettings](const std::string& i_rText)
+	    { return ParseNumber(i_rText, Limits::c_LeastRate, Limits::c_GreatestRate, i_rpSettings->m_Rate); });
+}
+
+VTake ReadTakeFile(const std::string& i_rPath, const VTakeSettings& i_rSettings)
+{
+	VTake take;
+	std::string error;
+	if (!ReadTake(InputPath(i_rPath, Limits::c_FileBytes).string(), i_rSettings, take, error))
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a take. " + error);
+	RequireNoErrors();
+	return take;
+}
+
+std::string StemOf(const std::string& i_rPath)
+{
+	return UtilsFileSystem::PathFromUtf8(i_rPath).stem().string();
+}
+
+} // namespace CommandLine
