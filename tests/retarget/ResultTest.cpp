@@ -117,6 +117,36 @@ TEST(Take, ShowsWhatTheFileHolds)
 	});
 }
 
+TEST(Take, IsHandedOn)
+{
+	const VScratchFolder folder;
+	const std::string bvh = Data("motion/chest_yxz_120fps.bvh"), text = Data("fbx/heaps_biped_zup_a7100.fbx");
+	const std::string binary = Data("fbx/own_game_zup_m_b7400.fbx");
+	const auto run = [&](const std::vector<std::string>& i_rArguments, int i_Status, const std::string& i_rError)
+	{
+		const VRun run = folder.Run(i_rArguments);
+		EXPECT_EQ(run.m_Status, i_Status) << run.m_Err;
+		EXPECT_NE(run.m_Err.find(i_rError), std::string::npos) << run.m_Err;
+	};
+	run({"take", bvh, "-o", "again.bvh"}, 0, "");
+	EXPECT_EQ(RunJson({"take", "again.bvh", "--json"}, folder).at("frames"), 61u);
+	run({"take", binary, "-o", "game.fbx"}, 0, "");
+	run({"take", "game.fbx", "--stack", "own_game_zup_m_b7400"}, 0, "");
+	run({"take", binary, "-o", "game.glb"}, 0, "");
+	EXPECT_EQ(folder.Read("game.glb").substr(0, 4), "glTF");
+	run({"take", text, "-o", "text.glb"}, 0, "Failed to load");
+	const std::vector<std::string> names = folder.Names();
+	run({"take", text, "-o", "strict.glb", "--strict"}, 1, "--strict");
+	run({"take", text, "-o", "text.fbx"}, 4, "only binary files of version 7 take one more animation stack");
+	run({"take", bvh, "-o", "chest.glb"}, 2, "that form holds the character, too: --fbx names its FBX file");
+	run({"take", bvh, "-o", "-"}, 2, "give it a name");
+	run({"take", bvh, "-o", "chest.txt"}, 2, "let the name of its file end in .bvh, .glb or .fbx");
+	run({"take", bvh, "-o", "chest.glb", "--fbx", bvh}, 3, "could not be read as a character. It is no FBX file");
+	run({"take", bvh, "-o", "chest.glb", "--fbx", text}, 4, "No bone has the name of a joint");
+	run({"take", "game.fbx", "-o", "game.fbx"}, 2, "is an input that saving there would destroy");
+	EXPECT_EQ(folder.Names(), names);
+}
+
 /// A character that is set up for the performer of a take, in the words of its file.
 TEST(Solve, PlaysATakeThroughASubject)
 {

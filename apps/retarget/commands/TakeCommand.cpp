@@ -2,6 +2,7 @@
 #include "CommandLineText/Messages.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/TakeFile.h"
+#include "retarget/text/MotionFile.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/Table.h"
 
@@ -22,6 +23,7 @@ struct VTakeCommand
 {
 	std::string m_File;
 	std::shared_ptr<VTakeSettings> m_pSettings = std::make_shared<VTakeSettings>();
+	VMotionOutput m_Output;
 };
 
 std::string SixDigits(double i_Number)
@@ -88,10 +90,23 @@ std::string TakeText(const VTake& i_rTake)
 	return FitTerminal(text, 2) + "\n" + table.Text(HasColours(STDOUT_FILENO), TerminalWidth());
 }
 
-EExitStatus ShowTake(const VTakeCommand& i_rCommand)
+EExitStatus RunTake(VTakeCommand i_Command)
 {
-	const VTake take = ReadTakeFile(i_rCommand.m_File, *i_rCommand.m_pSettings);
-	PrintResult(TakeToJson(take), TakeText(take));
+	VMotionOutput& rOutput = i_Command.m_Output;
+	// An FBX file with a take holds its character, too.
+	if (rOutput.m_Character.empty() && LowerExtension(i_Command.m_File) == ".fbx")
+		rOutput.m_Character = i_Command.m_File;
+	if (!rOutput.m_Path.empty())
+		CheckMotionOutput(rOutput, {i_Command.m_File, rOutput.m_Character});
+	const VTake take = ReadTakeFile(i_Command.m_File, *i_Command.m_pSettings);
+	if (rOutput.m_Path.empty())
+	{
+		PrintResult(TakeToJson(take), TakeText(take));
+		return EFine;
+	}
+	rOutput.m_Name = StemOf(i_Command.m_File);
+	WriteMotionFile(take, rOutput);
+	PrintResult({{"output", rOutput.m_Path}}, "");
 	return EFine;
 }
 
@@ -102,13 +117,24 @@ VCommand AddTakeCommand(CLI::App& io_rProgram)
 	CLI::App* const pApp = AddCommand(io_rProgram, "take",
 	    "Show what recorded motion (BVH, FBX 7) holds: frames and rate, and the joints as a tree with length in mm "
 	    "from the parent and channels, in our axes (Z up). What the file does not tell is guessed from its rest pose, "
-	    "and told",
+	    "and told. With -o it is written: as BVH, or on a character whose bones have the names of its joints",
 	    {"take walk.bvh", "take walk.bvh --unit cm --up z", "take hero.fbx --stack run --rate 30",
-	        "take walk.bvh --json | jq .rate"});
+	        "take walk.bvh --json | jq .rate", "take hero.fbx --stack run -o run.glb",
+	        "take solved.bvh --fbx hero.fbx -o hero_solved.fbx"});
 	const auto pCommand = std::make_shared<VTakeCommand>();
 	pApp->add_option("FILE", pCommand->m_File, "Take: BVH or FBX file; - is standard input")->required();
 	AddTakeOptions(*pApp, pCommand->m_pSettings);
-	return {pApp, [pCommand] { return ShowTake(*pCommand); }};
+	VMotionOutput& rOutput = pCommand->m_Output;
+	pApp->add_option("-o,--output", rOutput.m_Path,
+	        "Where the motion is written: .bvh, .glb (glTF binary: the character with its skin) or .fbx (the "
+	        "character's own binary file with one more animation stack)")
+	    ->option_text("OUT");
+	pApp->add_option("--fbx", rOutput.m_Character,
+	        "The character's FBX file, whose bones have the names of the joints; without it FILE itself, if that is "
+	        "one")
+	    ->option_text("FILE.fbx");
+	AddForceOption(*pApp, rOutput);
+	return {pApp, [pCommand] { return RunTake(*pCommand); }};
 }
 
 } // namespace CommandLine

@@ -263,6 +263,7 @@ constexpr VValue c_Values[] = {
     {"NAME=EXPR", Nothing},
     {"NAME=NUMBER", Nothing},
     {"NAME|INDEX", RootBone},
+    {"OUT", Files},
     {"OUT.png", Files},
     {"OUT.qrr", Files},
     {"OUT.qrs", Files},

@@ -286,6 +286,9 @@ void FBXIO::FBXMeshReader::ReadPlacedMesh(FbxNode& i_rNode, std::vector<VPlacedM
 	ScaleTranslation(placed.m_Transform, m_UnitScale);
 	CheckTransform(placed.m_Transform, placed.m_Name);
 	placed.m_Transform(3, 3) = 1.0f;
+	placed.m_bSkinned = FindSkin(i_rNode) != nullptr;
+	for (FbxNode* pNode = &i_rNode; pNode && placed.m_Bone.empty(); pNode = pNode->GetParent())
+		placed.m_Bone = pNode->GetSkeleton() ? pNode->GetName() : "";
 	if (ReadMesh(i_rNode, placed.m_Mesh))
 		io_rMeshes.push_back(std::move(placed));
 }

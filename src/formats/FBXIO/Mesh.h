@@ -70,6 +70,10 @@ struct VPlacedMesh
 	Rotation::VMatrix4 m_Transform;
 	/// The node's.
 	std::string m_Name;
+	/// Of the bone that it hangs on, or that it is itself; empty if there is none.
+	std::string m_Bone;
+	/// Whether bones move its vertices.
+	bool m_bSkinned = false;
 };
 
 struct VSkin

@@ -3,11 +3,10 @@
 #include "DebugServices/GlobalLog.h"
 #include "TakeIO/Axes.h"
 #include "TakeIO/FbxCurve.h"
+#include "TakeIO/FbxJoints.h"
 #include "TakeIO/Limits.h"
 #include "fbxsdk/container/FileKind.h"
-#include "fbxsdk/document/Document.h"
 #include "fbxsdk/document/Properties.h"
-#include "fbxsdk/scene/ReadTransform.h"
 
 #include <algorithm>
 #include <array>
@@ -33,10 +32,6 @@ constexpr double c_ValuesPerByte = 16.0;
 constexpr std::string_view c_Animated[]{"Lcl Translation", "Lcl Rotation", "Lcl Scaling"};
 constexpr std::string_view c_Components[]{"d|X", "d|Y", "d|Z"};
 
-/// Frames a second by the number of the time mode; 14 is the file's own.
-constexpr double c_TimeModes[]{30.0, 120.0, 100.0, 60.0, 50.0, 48.0, 30.0, 30.0, 30000.0 / 1001.0, 30000.0 / 1001.0,
-    25.0, 24.0, 1000.0, 24000.0 / 1001.0, 0.0, 96.0, 72.0, 60000.0 / 1001.0, 120000.0 / 1001.0};
-
 /// A coordinate: a curve, or what stands still.
 struct VComponent
 {
@@ -45,11 +40,8 @@ struct VComponent
 	std::optional<VFbxCurve> m_Curve;
 };
 
-struct VNode
+struct VNode : VFbxJoint
 {
-	VObjectIndex m_Object = c_NoObject;
-	std::int32_t m_Parent = -1;
-	VNodeTransform m_Rest;
 	std::array<VComponent, 9> m_Components;
 	/// Whether its place may change: its own coordinates, or the scaling of what is above it.
 	bool m_bMoves = false;
@@ -70,11 +62,8 @@ public:
 		const VFileKind kind = DetectFileKind(m_Bytes);
 		if (kind.m_Version < c_FirstVersion || kind.m_Version >= c_TooNewVersion)
 			return Fail("Takes are read from FBX files of version 7");
-		if (!m_Tree.Read(m_Bytes, kind))
-			return Fail("The FBX file is damaged: " + m_Tree.Error());
-		m_pDocument.emplace(m_Tree);
-		if (!m_pDocument->Error().empty())
-			return Fail("The FBX file is damaged: " + m_pDocument->Error());
+		if (!m_Records.Read(m_Bytes, m_Error))
+			return false;
 		m_Budget.m_BytesLeft = FbxFormat::Limits::DecodedBytes(m_Bytes.size());
 		return ReadSettings() && FindNodes() && FindStack() && ReadCurves() && FindSpan() && Sample();
 	}
@@ -88,103 +77,44 @@ private:
 		return false;
 	}
 
-	const VObject& Object(VObjectIndex i_Object) const { return m_pDocument->Objects()[i_Object]; }
+	const VObject& Object(VObjectIndex i_Object) const { return m_Records.Document().Objects()[i_Object]; }
 
 	bool IsOf(VObjectIndex i_Object, std::string_view i_Kind) const
 	{
-		return i_Object < m_pDocument->Objects().size() && Object(i_Object).m_Kind == i_Kind;
+		return i_Object < m_Records.Document().Objects().size() && Object(i_Object).m_Kind == i_Kind;
 	}
 
 	bool ReadSettings()
 	{
-		std::int64_t up = 1, mode = 0;
-		double factor = 1.0, custom = 0.0;
-		VisitProperties(m_Tree, m_pDocument->GlobalSettings(),
-		    [&](std::string_view i_Name, VValueCursor& io_rCursor)
-		    {
-			    if (i_Name == "UpAxis")
-				    up = io_rCursor.Next().AsInteger(1);
-			    else if (i_Name == "UnitScaleFactor")
-				    factor = io_rCursor.Next().AsReal(1.0);
-			    else if (i_Name == "TimeMode")
-				    mode = io_rCursor.Next().AsInteger(0);
-			    else if (i_Name == "CustomFrameRate")
-				    custom = io_rCursor.Next().AsReal(0.0);
-		    });
-		if (!m_rSettings.m_Up && up != 1 && up != 2)
+		const VFbxSettings settings = ReadFbxSettings(m_Records.Document());
+		if (!m_rSettings.m_Up && !settings.m_Up)
 			return Fail("Its X axis points up, which is not read");
-		m_rTake.m_FileUp = m_rSettings.m_Up.value_or(up == 2 ? EUp::Z : EUp::Y);
-		m_rTake.m_FileUnit = m_rSettings.m_Unit.value_or(10.0 * factor);
-		if (!(m_rTake.m_FileUnit >= TakeIO::Limits::c_LeastUnit
-		        && m_rTake.m_FileUnit <= TakeIO::Limits::c_GreatestUnit))
-			return Fail("Its unit is none");
-		const double rate = mode >= 0 && mode < std::int64_t(std::size(c_TimeModes)) ? c_TimeModes[mode] : 0.0;
-		m_rTake.m_Rate = m_rSettings.m_Rate.value_or(rate > 0.0 ? rate : custom);
-		if (!(m_rTake.m_Rate >= TakeIO::Limits::c_LeastRate && m_rTake.m_Rate <= TakeIO::Limits::c_GreatestRate))
-			m_rTake.m_Rate = c_TimeModes[0];
-		return true;
+		m_rTake.m_FileUp = m_rSettings.m_Up ? *m_rSettings.m_Up : *settings.m_Up;
+		m_rTake.m_FileUnit = m_rSettings.m_Unit.value_or(settings.m_Unit);
+		m_rTake.m_Rate = m_rSettings.m_Rate.value_or(settings.m_Rate);
+		return m_rTake.m_FileUnit > 0.0 || Fail("Its unit is none");
 	}
 
-	/// Bones and all above them, parents before children.
 	bool FindNodes()
 	{
-		const std::size_t count = m_pDocument->Objects().size();
-		std::vector<VObjectIndex> parents(count, c_NoObject), stack, roots;
-		std::vector<std::vector<VObjectIndex>> children(count);
-		for (const VConnection& rConnection : m_pDocument->Connections())
+		std::vector<VFbxJoint> joints;
+		if (!ReadFbxJoints(m_Records.Document(), joints, m_Error))
+			return false;
+		m_NodeOf.assign(m_Records.Document().Objects().size(), -1);
+		for (const VFbxJoint& rJoint : joints)
 		{
-			const VObjectIndex child = rConnection.m_Child;
-			if (!rConnection.m_Property.empty() || !IsOf(child, "Model") || parents[child] != c_NoObject)
-				continue;
-			if (rConnection.m_Parent == c_SceneObject)
-				roots.push_back(child);
-			else if (IsOf(rConnection.m_Parent, "Model"))
-				children[rConnection.m_Parent].push_back(child);
-			else
-				continue;
-			parents[child] = rConnection.m_Parent;
+			m_NodeOf[rJoint.m_Object] = std::int32_t(m_Nodes.size());
+			m_Nodes.push_back({rJoint, {}});
 		}
-		std::vector<bool> kept(count);
-		bool bBones = false;
-		for (VObjectIndex object = 0; object < count; ++object)
-			for (VObjectIndex above = IsBone(object) ? object : c_NoObject; above < count && !kept[above];
-			     above = parents[above])
-				kept[above] = bBones = true;
-		VNodeTransform defaults;
-		ReadTransform(m_Tree, m_pDocument->Template("Model"), defaults);
-		m_NodeOf.assign(count, -1);
-		// Only what a chain leads to from the scene: what lies in a ring is not.
-		for (stack.assign(roots.rbegin(), roots.rend()); !stack.empty();)
-		{
-			const VObjectIndex object = stack.back();
-			stack.pop_back();
-			if (bBones && !kept[object])
-				continue;
-			if (m_Nodes.size() == TakeIO::Limits::c_Joints)
-				return Fail("It has more than " + std::to_string(TakeIO::Limits::c_Joints) + " joints");
-			m_NodeOf[object] = std::int32_t(m_Nodes.size());
-			VNode& rNode = m_Nodes.emplace_back();
-			rNode.m_Object = object;
-			rNode.m_Parent = parents[object] < count ? m_NodeOf[parents[object]] : -1;
-			rNode.m_Rest = defaults;
-			ReadTransform(m_Tree, Object(object).m_Element, rNode.m_Rest);
-			stack.insert(stack.end(), children[object].rbegin(), children[object].rend());
-		}
-		return !m_Nodes.empty() || Fail("It has no joints");
-	}
-
-	bool IsBone(VObjectIndex i_Object) const
-	{
-		const std::string_view kind = Object(i_Object).m_SubKind;
-		return IsOf(i_Object, "Model") && (kind == "LimbNode" || kind == "Limb" || kind == "Root");
+		return true;
 	}
 
 	bool FindStack()
 	{
-		for (VObjectIndex object = 0; object < m_pDocument->Objects().size(); ++object)
+		for (VObjectIndex object = 0; object < m_Records.Document().Objects().size(); ++object)
 			if (IsOf(object, "AnimationStack"))
 			{
-				const std::string name = m_pDocument->Decoded(Object(object).m_Name);
+				const std::string name = m_Records.Document().Decoded(Object(object).m_Name);
 				m_Names += (m_Names.empty() ? "" : ", ") + name;
 				++m_Stacks;
 				if (m_Stack == c_NoObject && m_rSettings.m_Stack.value_or(name) == name)
@@ -206,19 +136,19 @@ private:
 	{
 		VObjectIndex layer = c_NoObject;
 		std::size_t layers = 0;
-		for (const VConnection& rConnection : m_pDocument->Connections())
+		for (const VConnection& rConnection : m_Records.Document().Connections())
 			if (rConnection.m_Parent == m_Stack && IsOf(rConnection.m_Child, "AnimationLayer"))
 				layer = layers++ == 0 ? rConnection.m_Child : layer;
 		if (layers > 1)
 			NVX_LOG("TakeIO", NVX::ELogWarning, "Layers of the stack \"%1%\" that are left out: %2%", m_StackName,
 			    layers - 1);
-		std::vector<bool> inLayer(m_pDocument->Objects().size());
-		for (const VConnection& rConnection : m_pDocument->Connections())
+		std::vector<bool> inLayer(m_Records.Document().Objects().size());
+		for (const VConnection& rConnection : m_Records.Document().Connections())
 			if (layer != c_NoObject && rConnection.m_Parent == layer && IsOf(rConnection.m_Child, "AnimationCurveNode"))
 				inLayer[rConnection.m_Child] = true;
 		// The first coordinate of the three that a curve node moves.
-		std::vector<std::vector<VComponent*>> moved(m_pDocument->Objects().size());
-		for (const VConnection& rConnection : m_pDocument->Connections())
+		std::vector<std::vector<VComponent*>> moved(m_Records.Document().Objects().size());
+		for (const VConnection& rConnection : m_Records.Document().Connections())
 		{
 			const auto* const pProperty = std::ranges::find(c_Animated, rConnection.m_Property);
 			if (pProperty == std::end(c_Animated) || !IsOf(rConnection.m_Parent, "Model")
@@ -231,7 +161,7 @@ private:
 			moved[rConnection.m_Child].push_back(pFirst);
 			rNode.m_bMoves = true;
 			rNode.m_bScales = rNode.m_bScales || kind == 2;
-			VisitProperties(m_Tree, Object(rConnection.m_Child).m_Element,
+			VisitProperties(m_Records.Tree(), Object(rConnection.m_Child).m_Element,
 			    [pFirst](std::string_view i_Name, VValueCursor& io_rCursor)
 			    {
 				    const auto* const pFound = std::ranges::find(c_Components, i_Name);
@@ -242,7 +172,7 @@ private:
 				    rComponent.m_bGiven = std::abs(rComponent.m_Value) <= TakeIO::Limits::c_Largest;
 			    });
 		}
-		for (const VConnection& rConnection : m_pDocument->Connections())
+		for (const VConnection& rConnection : m_Records.Document().Connections())
 		{
 			const auto* const pComponent = std::ranges::find(c_Components, rConnection.m_Property);
 			if (pComponent == std::end(c_Components) || rConnection.m_Parent >= moved.size()
@@ -251,7 +181,7 @@ private:
 			for (VComponent* const pFirst : moved[rConnection.m_Parent])
 			{
 				std::optional<VFbxCurve>& rCurve = pFirst[pComponent - c_Components].m_Curve;
-				if (!rCurve.emplace().Read(m_Tree, Object(rConnection.m_Child).m_Element, m_Budget))
+				if (!rCurve.emplace().Read(m_Records.Tree(), Object(rConnection.m_Child).m_Element, m_Budget))
 					return Fail("A curve of its stack \"" + m_StackName + "\" is damaged or too large");
 				m_FirstKey = std::min(m_FirstKey, rCurve->FirstTime());
 				m_LastKey = std::max(m_LastKey, rCurve->LastTime());
@@ -267,7 +197,7 @@ private:
 	bool FindSpan()
 	{
 		double start = 0.0, stop = 0.0;
-		VisitProperties(m_Tree, Object(m_Stack).m_Element,
+		VisitProperties(m_Records.Tree(), Object(m_Stack).m_Element,
 		    [&](std::string_view i_Name, VValueCursor& io_rCursor)
 		    {
 			    if (i_Name == "LocalStart")
@@ -277,48 +207,34 @@ private:
 		    });
 		m_Start = stop > start ? start : m_FirstKey;
 		const double seconds = ((stop > start ? stop : m_LastKey) - m_Start) / c_FbxSecond;
-		const double frames = std::floor(seconds * m_rTake.m_Rate + 1e-6) + 1.0;
-		for (VNode& rNode : m_Nodes)
-			m_rTake.m_Channels += rNode.m_bMoves ? std::size(c_Channels) : 0;
+		m_Frames = std::floor(seconds * m_rTake.m_Rate + 1e-6) + 1.0;
+		const auto moving = double(std::ranges::count(m_Nodes, true, &VNode::m_bMoves));
 		const double most =
 		    std::min(double(TakeIO::Limits::c_Values), c_ValuesOfAny + c_ValuesPerByte * double(m_Bytes.size()));
-		if (!(frames * double(m_rTake.m_Channels) <= most))
+		if (!(m_Frames * moving * double(std::size(c_AllChannels)) <= most))
 			return Fail("Its stack \"" + m_StackName + "\" lasts longer than such a file is read");
-		m_rTake.m_Frames = std::size_t(frames);
 		return true;
 	}
 
 	bool Sample()
 	{
-		std::size_t first = 0;
 		for (const VNode& rNode : m_Nodes)
 		{
 			VJoint& rJoint = m_rTake.m_Joints.emplace_back();
-			rJoint.m_Name = m_pDocument->Decoded(Object(rNode.m_Object).m_Name);
+			rJoint.m_Name = m_Records.Document().Decoded(Object(rNode.m_Object).m_Name);
 			rJoint.m_Parent = rNode.m_Parent;
-			rJoint.m_FirstValue = first;
 			if (rNode.m_bMoves)
-				rJoint.m_Channels.assign(std::begin(c_Channels), std::end(c_Channels));
-			first += rJoint.m_Channels.size();
+				AddChannels(m_rTake, m_rTake.m_Joints.size() - 1, true);
 		}
 		m_Globals.resize(m_Nodes.size());
 		m_Poses.resize(m_Nodes.size());
 		bool bFinite = ComputePoses({});
-		for (std::size_t i = 0; i < m_Nodes.size(); ++i)
-			m_rTake.m_Joints[i].m_Rest = Local(i);
-		m_rTake.m_Values.reserve(m_rTake.m_Frames * m_rTake.m_Channels);
-		for (std::size_t frame = 0; frame < m_rTake.m_Frames && bFinite; ++frame)
+		SetWorldRest(m_rTake, m_Poses);
+		m_rTake.m_Values.reserve(std::size_t(m_Frames) * m_rTake.m_Channels);
+		for (double frame = 0.0; frame < m_Frames && bFinite; ++frame)
 		{
-			bFinite = ComputePoses(m_Start + double(frame) * c_FbxSecond / m_rTake.m_Rate);
-			for (std::size_t i = 0; i < m_Nodes.size(); ++i)
-				if (m_Nodes[i].m_bMoves)
-				{
-					const VJointPose pose = Local(i);
-					VVector3 angles{};
-					Rotation::EulerFromRotationMatrix(pose.R, Rotation::EZYX, angles);
-					m_rTake.m_Values.insert(m_rTake.m_Values.end(), pose.t.begin(), pose.t.end());
-					m_rTake.m_Values.insert(m_rTake.m_Values.end(), angles.begin(), angles.end());
-				}
+			bFinite = ComputePoses(m_Start + frame * c_FbxSecond / m_rTake.m_Rate);
+			AddFrame(m_rTake, m_Poses);
 		}
 		return bFinite || Fail("Its joints are beyond any stage");
 	}
@@ -365,20 +281,10 @@ private:
 		return std::ranges::all_of(o_rPose.t, isSound) && std::ranges::all_of(o_rPose.R, isSound);
 	}
 
-	VJointPose Local(std::size_t i_Node) const
-	{
-		const std::int32_t parent = m_Nodes[i_Node].m_Parent;
-		return parent < 0 ? m_Poses[i_Node] : Rotation::Relative(m_Poses[std::size_t(parent)], m_Poses[i_Node]);
-	}
-
-	static constexpr EChannel c_Channels[]{EChannel::XPosition, EChannel::YPosition, EChannel::ZPosition,
-	    EChannel::ZRotation, EChannel::YRotation, EChannel::XRotation};
-
 	const std::string_view m_Bytes;
 	const VTakeSettings& m_rSettings;
 	VTake& m_rTake;
-	VElementTree m_Tree;
-	std::optional<VDocument> m_pDocument;
+	VFbxRecords m_Records;
 	VDecodeBudget m_Budget;
 	std::vector<VNode> m_Nodes;
 	/// By object; -1 of what is no joint.
@@ -390,6 +296,7 @@ private:
 	double m_FirstKey = std::numeric_limits<double>::infinity();
 	double m_LastKey = -std::numeric_limits<double>::infinity();
 	double m_Start = 0.0;
+	double m_Frames = 0.0;
 	std::vector<VGlobalTransform> m_Globals;
 	/// To the world.
 	std::vector<VJointPose> m_Poses;

@@ -40,6 +40,13 @@ void ComposeAll(const VTake& i_rTake, std::vector<VJointPose>& o_rPoses, const T
 	}
 }
 
+/// Of a joint to its parent, from poses in the world.
+VJointPose LocalOf(const VTake& i_rTake, std::size_t i_Joint, std::span<const VJointPose> i_Poses)
+{
+	const std::int32_t parent = i_rTake.m_Joints[i_Joint].m_Parent;
+	return parent < 0 ? i_Poses[i_Joint] : Relative(i_Poses[std::size_t(parent)], i_Poses[i_Joint]);
+}
+
 /// A frame's own pose at part 0, the next one's at 1.
 VJointPose Between(const VJointPose& i_rFrom, const VJointPose& i_rTo, double i_Part)
 {
@@ -103,6 +110,36 @@ void TakeIO::WorldPoses(const VTake& i_rTake, std::size_t i_Frame, std::vector<V
 void TakeIO::WorldRestPoses(const VTake& i_rTake, std::vector<VJointPose>& o_rPoses)
 {
 	ComposeAll(i_rTake, o_rPoses, [&](std::size_t i_Joint) { return i_rTake.m_Joints[i_Joint].m_Rest; });
+}
+
+void TakeIO::AddChannels(VTake& io_rTake, std::size_t i_Joint, bool i_bGoes)
+{
+	VJoint& rJoint = io_rTake.m_Joints[i_Joint];
+	rJoint.m_Channels.assign(std::begin(c_AllChannels) + (i_bGoes ? 0 : 3), std::end(c_AllChannels));
+	rJoint.m_FirstValue = io_rTake.m_Channels;
+	io_rTake.m_Channels += rJoint.m_Channels.size();
+}
+
+void TakeIO::SetWorldRest(VTake& io_rTake, std::span<const VJointPose> i_Poses)
+{
+	for (std::size_t i = 0; i < io_rTake.m_Joints.size(); ++i)
+		io_rTake.m_Joints[i].m_Rest = LocalOf(io_rTake, i, i_Poses);
+}
+
+void TakeIO::AddFrame(VTake& io_rTake, std::span<const VJointPose> i_Poses)
+{
+	for (std::size_t i = 0; i < io_rTake.m_Joints.size(); ++i)
+	{
+		if (io_rTake.m_Joints[i].m_Channels.empty())
+			continue;
+		const VJointPose pose = LocalOf(io_rTake, i, i_Poses);
+		VVector3 angles{};
+		EulerFromRotationMatrix(pose.R, EZYX, angles);
+		if (!IsRotation(io_rTake.m_Joints[i].m_Channels.front()))
+			io_rTake.m_Values.insert(io_rTake.m_Values.end(), pose.t.begin(), pose.t.end());
+		io_rTake.m_Values.insert(io_rTake.m_Values.end(), angles.begin(), angles.end());
+	}
+	++io_rTake.m_Frames;
 }
 
 bool TakeIO::Resample(VTake& io_rTake, double i_Rate)

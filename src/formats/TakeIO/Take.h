@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -90,6 +91,18 @@ VJointPose LocalPose(const VTake& i_rTake, std::size_t i_Joint, std::size_t i_Fr
 /// Of all joints, into room that is kept from call to call.
 void WorldPoses(const VTake& i_rTake, std::size_t i_Frame, std::vector<VJointPose>& o_rPoses);
 void WorldRestPoses(const VTake& i_rTake, std::vector<VJointPose>& o_rPoses);
+
+/// A joint that may go and turn anywhere; the last three are those of one that only turns.
+inline constexpr EChannel c_AllChannels[]{EChannel::XPosition, EChannel::YPosition, EChannel::ZPosition,
+    EChannel::ZRotation, EChannel::YRotation, EChannel::XRotation};
+
+/// Gives a joint c_AllChannels, or the last three. Joints in their order, before the first frame.
+void AddChannels(VTake& io_rTake, std::size_t i_Joint, bool i_bGoes);
+
+/// Rest poses, and another frame, from the poses of all joints in the world. Joints have the channels that AddChannels
+/// gives, or none: these keep their rest pose.
+void SetWorldRest(VTake& io_rTake, std::span<const VJointPose> i_Poses);
+void AddFrame(VTake& io_rTake, std::span<const VJointPose> i_Poses);
 
 /// The same motion at another rate, from the first frame on to the last that is not beyond the end. Between two frames
 /// places go along a line and rotations about one axis, by the shorter way.

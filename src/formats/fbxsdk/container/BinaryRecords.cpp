@@ -10,9 +10,6 @@ namespace
 
 using namespace FbxFormat;
 
-/// From this version on the three counts of a record's header have 64 bits.
-constexpr std::uint32_t c_FirstWideVersion = 7500;
-
 struct VHeader
 {
 	std::uint64_t m_End = 0;
@@ -50,7 +47,7 @@ bool AreValuesSound(std::string_view i_Values, std::uint64_t i_Count)
 void FbxFormat::ReadBinaryRecords(std::string_view i_Bytes, std::uint32_t i_Version, VTreeBuilder& io_rBuilder)
 {
 	const bool bWide = i_Version >= c_FirstWideVersion;
-	const std::size_t headerSize = bWide ? 25 : 13;
+	const std::size_t headerSize = RecordHeaderSize(bWide);
 	std::size_t position = c_BinaryHeaderSize;
 	while (true)
 	{

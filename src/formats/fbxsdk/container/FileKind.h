@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 
@@ -33,5 +34,14 @@ inline constexpr std::uint32_t c_TooNewVersion = 8000;
 
 /// The length of the magic, the byte order and the version of a binary file: its records follow.
 inline constexpr std::size_t c_BinaryHeaderSize = 27;
+
+/// From this version on the three counts of a binary record have 64 bits.
+inline constexpr std::uint32_t c_FirstWideVersion = 7500;
+
+/// End, count of values, size of values, and a byte for the length of the name; all zero at the end of a list.
+constexpr std::size_t RecordHeaderSize(bool i_bWide)
+{
+	return i_bWide ? 25 : 13;
+}
 
 } // namespace FbxFormat

@@ -4,15 +4,16 @@
 #include "fbxsdk/container/FileKind.h"
 #include "math/NumberText.h"
 
+#include <libdeflate.h>
+
 #include <cstring>
+#include <memory>
+#include <type_traits>
 
 namespace
 {
 
 using namespace FbxFormat;
-
-/// End, count of values, size of values and length of the name, before version 7.5.
-constexpr std::size_t c_HeaderSize = 13;
 
 template <typename T>
 void AppendBytes(std::string& io_rBytes, char i_Type, T i_Value)
@@ -21,37 +22,101 @@ void AppendBytes(std::string& io_rBytes, char i_Type, T i_Value)
 	io_rBytes.append(reinterpret_cast<const char*>(&i_Value), sizeof(i_Value));
 }
 
+/// The letter of a number, and in lower case that of an array of such.
+template <typename T>
+constexpr char c_Letter = std::is_same_v<T, double> ? 'D'
+    : std::is_same_v<T, float>                      ? 'F'
+    : sizeof(T) == 4                                ? 'I'
+                                                    : 'L';
+
+/// Below this, what deflating adds is more than it saves.
+constexpr std::size_t c_LeastDeflated = 128;
+
+template <typename T>
+void AppendArray(std::string& io_rBytes, std::span<const T> i_Numbers)
+{
+	const std::size_t size = i_Numbers.size_bytes();
+	const bool bDeflate = size >= c_LeastDeflated;
+	std::string deflated;
+	if (bDeflate)
+	{
+		using VCompressor = std::unique_ptr<libdeflate_compressor, decltype(&libdeflate_free_compressor)>;
+		thread_local const VCompressor pCompressor(libdeflate_alloc_compressor(6), &libdeflate_free_compressor);
+		deflated.resize(libdeflate_zlib_compress_bound(pCompressor.get(), size));
+		deflated.resize(
+		    libdeflate_zlib_compress(pCompressor.get(), i_Numbers.data(), size, deflated.data(), deflated.size()));
+	}
+	const std::uint32_t header[3]{
+	    std::uint32_t(i_Numbers.size()), bDeflate ? 1u : 0u, std::uint32_t(bDeflate ? deflated.size() : size)};
+	io_rBytes += char(c_Letter<T> - 'A' + 'a');
+	io_rBytes.append(reinterpret_cast<const char*>(header), sizeof(header));
+	if (bDeflate)
+		io_rBytes += deflated;
+	else
+		io_rBytes.append(reinterpret_cast<const char*>(i_Numbers.data()), size);
+}
+
 void AppendBinary(std::string& io_rBytes, const VWrittenValue& i_rValue)
 {
-	if (const auto* const pInteger = std::get_if<std::int64_t>(&i_rValue))
-		AppendBytes(io_rBytes, 'L', *pInteger);
-	else if (const auto* const pReal = std::get_if<double>(&i_rValue))
-		AppendBytes(io_rBytes, 'D', *pReal);
-	else
-	{
-		const auto text = std::get<std::string_view>(i_rValue);
-		AppendBytes(io_rBytes, 'S', std::uint32_t(text.size()));
-		io_rBytes += text;
-	}
+	std::visit(
+	    [&io_rBytes]<typename T>(const T& i_rAny)
+	    {
+		    if constexpr (std::is_arithmetic_v<T>)
+			    AppendBytes(io_rBytes, c_Letter<T>, i_rAny);
+		    else if constexpr (std::is_same_v<T, std::string_view>)
+		    {
+			    AppendBytes(io_rBytes, 'S', std::uint32_t(i_rAny.size()));
+			    io_rBytes += i_rAny;
+		    }
+		    else
+			    AppendArray(io_rBytes, i_rAny);
+	    },
+	    i_rValue);
+}
+
+void AppendNumber(std::string& io_rBytes, double i_Number)
+{
+	NumberText::AppendG17(io_rBytes, i_Number);
+}
+
+void AppendNumber(std::string& io_rBytes, std::int64_t i_Number)
+{
+	io_rBytes += std::to_string(i_Number);
 }
 
 void AppendText(std::string& io_rBytes, const VWrittenValue& i_rValue)
 {
 	if (!io_rBytes.empty())
 		io_rBytes += ',';
-	if (const auto* const pInteger = std::get_if<std::int64_t>(&i_rValue))
-		io_rBytes += std::to_string(*pInteger);
-	else if (const auto* const pReal = std::get_if<double>(&i_rValue))
-		NumberText::AppendG17(io_rBytes, *pReal);
-	else
-		((io_rBytes += '"') += std::get<std::string_view>(i_rValue)) += '"';
+	const auto number = [&io_rBytes]<typename T>(T i_Number)
+	{ AppendNumber(io_rBytes, std::conditional_t<std::is_floating_point_v<T>, double, std::int64_t>(i_Number)); };
+	std::visit(
+	    [&]<typename T>(const T& i_rAny)
+	    {
+		    if constexpr (std::is_arithmetic_v<T>)
+			    number(i_rAny);
+		    else if constexpr (std::is_same_v<T, std::string_view>)
+			    ((io_rBytes += '"') += i_rAny) += '"';
+		    else
+			    for (std::size_t i = 0; i < i_rAny.size(); ++i)
+			    {
+				    io_rBytes += i > 0 ? "," : "";
+				    number(i_rAny[i]);
+			    }
+	    },
+	    i_rValue);
 }
 
 } // namespace
 
 FbxFormat::VRecordWriter::VRecordWriter(const VElementTree& i_rSource)
-    : m_rSource(i_rSource), m_bText(i_rSource.Size() > 1 && i_rSource[1].m_Form != EValueForm::Binary),
-      m_Bytes(m_bText ? 0 : c_BinaryHeaderSize, '\0')
+    : m_pSource(&i_rSource), m_bText(i_rSource.Size() > 1 && i_rSource[1].m_Form != EValueForm::Binary), m_bWide(false),
+      m_Place(0), m_Bytes(m_bText ? 0 : c_BinaryHeaderSize, '\0')
+{
+}
+
+FbxFormat::VRecordWriter::VRecordWriter(std::uint32_t i_Version, std::size_t i_Place)
+    : m_pSource(nullptr), m_bText(false), m_bWide(i_Version >= c_FirstWideVersion), m_Place(i_Place)
 {
 }
 
@@ -65,8 +130,12 @@ bool FbxFormat::VRecordWriter::Begin(std::string_view i_Name, std::string_view i
 		(((m_Bytes += i_Name) += ": ") += i_Values) += '\n';
 	else
 	{
-		const std::uint32_t header[3]{0, i_Count, std::uint32_t(i_Values.size())};
-		m_Bytes.append(reinterpret_cast<const char*>(header), sizeof(header));
+		// Where it ends is known at its end.
+		if (const std::uint64_t wide[3]{0, i_Count, i_Values.size()}; m_bWide)
+			m_Bytes.append(reinterpret_cast<const char*>(wide), sizeof(wide));
+		else
+			for (const std::uint64_t number : wide)
+				m_Bytes.append(reinterpret_cast<const char*>(&number), 4);
 		((m_Bytes += char(i_Name.size())) += i_Name) += i_Values;
 	}
 	return true;
@@ -74,9 +143,9 @@ bool FbxFormat::VRecordWriter::Begin(std::string_view i_Name, std::string_view i
 
 void FbxFormat::VRecordWriter::End(std::size_t i_Record)
 {
-	const auto end = std::uint32_t(m_Bytes.size());
+	const std::uint64_t end = m_Place + m_Bytes.size();
 	if (!m_bText)
-		std::memcpy(m_Bytes.data() + i_Record, &end, sizeof(end));
+		std::memcpy(m_Bytes.data() + i_Record, &end, m_bWide ? 8 : 4);
 }
 
 void FbxFormat::VRecordWriter::Open(std::string_view i_Name, std::initializer_list<VWrittenValue> i_Values)
@@ -100,7 +169,7 @@ void FbxFormat::VRecordWriter::Close()
 	if (m_bText)
 		m_Bytes += "}\n";
 	else
-		m_Bytes.append(c_HeaderSize, '\0');
+		m_Bytes.append(RecordHeaderSize(m_bWide), '\0');
 	End(record);
 }
 
@@ -117,13 +186,13 @@ void FbxFormat::VRecordWriter::Add(std::string_view i_Name, std::initializer_lis
 void FbxFormat::VRecordWriter::Copy(std::string_view i_Name, VElementIndex i_Element)
 {
 	const std::size_t record = m_Bytes.size();
-	if (i_Element != c_NoElement && Begin(i_Name, m_rSource.Values(i_Element), m_rSource[i_Element].m_ValueCount))
+	if (i_Element != c_NoElement && Begin(i_Name, m_pSource->Values(i_Element), (*m_pSource)[i_Element].m_ValueCount))
 		End(record);
 }
 
 std::string FbxFormat::VRecordWriter::Finish()
 {
-	if (!m_bText)
-		m_Bytes.append(c_HeaderSize, '\0');
+	if (!m_bText && m_pSource)
+		m_Bytes.append(RecordHeaderSize(m_bWide), '\0');
 	return std::move(m_Bytes);
 }
