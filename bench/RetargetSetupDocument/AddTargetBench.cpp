@@ -4,9 +4,11 @@
 namespace
 {
 
-void AddTarget(benchmark::State& io_rState)
+void AddTarget(benchmark::State& io_rState, bool i_bHistory)
 {
 	VBenchDocument bench(std::size_t(io_rState.range(0)));
+	if (i_bHistory)
+		bench.m_Document.KeepHistory(bench.m_Host.GetSelectionManager());
 	const std::size_t before = bench.m_Start.m_pParametrised->m_Targets.size();
 	for (auto _ : io_rState)
 	{
@@ -21,14 +23,16 @@ void AddTarget(benchmark::State& io_rState)
 }
 
 /// What a drag does at each move of the mouse.
-void SetPose(benchmark::State& io_rState)
+void SetPose(benchmark::State& io_rState, bool i_bHistory)
 {
 	VBenchDocument bench(std::size_t(io_rState.range(0)));
+	if (i_bHistory)
+		bench.m_Document.KeepHistory(bench.m_Host.GetSelectionManager());
 	for (auto _ : io_rState)
 	{
 		CoreOrlexTypes::VSubjectParametrised subject = *bench.m_Document.TargetValues().m_pParametrised;
 		subject.m_Segments[1].m_Joint.m_BindPose[0] += 0.001;
-		bench.m_Document.SetTargetSubjectParametrised(std::move(subject));
+		bench.m_Document.SetTargetSubjectParametrised(std::move(subject), {"Pose", 1});
 	}
 	Report(io_rState);
 }
@@ -40,12 +44,17 @@ void Sizes(benchmark::internal::Benchmark* io_pBenchmark)
 }
 
 BENCHMARK(Copies)->Apply(Sizes);
-BENCHMARK(AddTarget)->Apply(Sizes);
-BENCHMARK(SetPose)->Apply(Sizes);
+BENCHMARK_CAPTURE(AddTarget, plain, false)->Name("AddTarget")->Apply(Sizes);
+BENCHMARK_CAPTURE(SetPose, plain, false)->Name("SetPose")->Apply(Sizes);
+// What a history costs beside them.
+BENCHMARK_CAPTURE(AddTarget, history, true)->Name("AddTargetUndoable")->Apply(Sizes);
+BENCHMARK_CAPTURE(SetPose, history, true)->Name("SetPoseUndoable")->Apply(Sizes);
 
 } // namespace
 
 int main(int i_Count, char** i_ppArguments)
 {
-	return Ratios::Main(i_Count, i_ppArguments, {{"AddTarget", "Copies", 6.0}, {"SetPose", "Copies", 6.0}});
+	return Ratios::Main(i_Count, i_ppArguments,
+	    {{"AddTarget", "Copies", 6.0}, {"SetPose", "Copies", 6.0}, {"AddTargetUndoable", "AddTarget", 1.3},
+	        {"SetPoseUndoable", "SetPose", 1.1}});
 }

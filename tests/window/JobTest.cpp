@@ -5,6 +5,7 @@
 #include "studio/host/Services.h"
 
 #include <QFile>
+#include <QQuickItem>
 
 namespace
 {
@@ -263,6 +264,85 @@ TEST_F(Job, MenusActOnWhatTheyWereOpenedOn)
 	choose("Remove target");
 	EXPECT_EQ(Targets(), 1);
 	EXPECT_TRUE(rOperator.Property("removeTarget", "enabled").toBool()) << "the one that took its place";
+}
+
+TEST_F(Job, UndoesAndRedoes)
+{
+	VOperator& rOperator = *m_pOperator;
+	CreateTargetSubject();
+	const auto weight = [&] { return rOperator.Property("TargetWeight", "text").toString(); };
+	const auto undo = [&] { rOperator.Key(Qt::Key_Z, Qt::ControlModifier); };
+	const auto redo = [&] { rOperator.Key(Qt::Key_Z, Qt::ControlModifier | Qt::ShiftModifier); };
+	const auto menu = [&](const char* i_pAction) { return rOperator.ChooseInMenu("EditMenu", i_pAction); };
+	const auto selected = [&] { return rOperator.Property("sourceSegments", "selectedIndex").toInt(); };
+	SelectPair("Pelvis", "haunch");
+	rOperator.Click("addPositionTarget");
+	rOperator.Click("saveAs");
+	rOperator.AnswerDialog(File("first.qrr"));
+	EXPECT_EVENTUALLY(rOperator.Property("currentFile", "text").toString() == "Current file: first.qrr");
+	SelectPair("Cranium", "skull");
+	rOperator.Key(Qt::Key_T, Qt::AltModifier);
+	EXPECT_EVENTUALLY(Targets() == 2);
+	rOperator.ClickRow("targets", 1);
+	EXPECT_EVENTUALLY(weight() == "1");
+
+	// What is being typed is the field's own; what it has taken is a step.
+	rOperator.Replace("TargetWeight", "7");
+	undo();
+	EXPECT_EQ(weight(), "1");
+	EXPECT_EQ(Targets(), 2);
+	rOperator.Fill("TargetWeight", "7");
+	rOperator.Fill("TargetWeight", "8");
+	undo();
+	EXPECT_EVENTUALLY(weight() == "7");
+	undo();
+	EXPECT_EVENTUALLY(weight() == "1");
+	redo();
+	EXPECT_EVENTUALLY(weight() == "7");
+	rOperator.Replace("TargetWeight", "9");
+	EXPECT_EQ(menu("Undo"), "&Undo Change Weight");
+	EXPECT_EVENTUALLY(weight() == "7");
+	EXPECT_EQ(menu("Redo"), "&Redo Change Weight");
+	EXPECT_EVENTUALLY(weight() == "9");
+	// The way of a slider.
+	QQuickItem* const pSlider = rOperator.Item("TargetWeightSlider");
+	const auto onSlider = [&](double i_Share)
+	{
+		return rOperator.Item("scene")
+		    ->mapFromItem(pSlider, {i_Share * pSlider->width(), pSlider->height() / 2})
+		    .toPoint();
+	};
+	for (const double end : {0.5, 0.8})
+	{
+		rOperator.Drag({Qt::LeftButton}, onSlider(0.2), onSlider(end));
+		EXPECT_EVENTUALLY(weight().toDouble() > 90 * end);
+	}
+	undo();
+	EXPECT_EVENTUALLY(weight().toDouble() < 60 && weight().toDouble() > 45);
+	undo();
+	EXPECT_EVENTUALLY(weight() == "9");
+
+	EXPECT_TRUE(m_pWindow->isWindowModified());
+	for (const char* const pStep : {"Change Weight", "Change Weight", "Add Target"})
+		EXPECT_EQ(menu("Undo"), QString("&Undo ") + pStep);
+	EXPECT_EQ(Targets(), 1);
+	EXPECT_FALSE(m_pWindow->isWindowModified()) << "as it was saved";
+	EXPECT_EVENTUALLY(selected() == RowOf("sourceSegments", "Cranium"));
+	undo();
+	undo();
+	EXPECT_EVENTUALLY(rOperator.Property("targetSegments", "count").toInt() == 0);
+	EXPECT_EQ(rOperator.Property("currentFile", "text").toString(), "Current file: *None*");
+	undo();
+	EXPECT_EQ(rOperator.Property("status", "text").toString(), "There is nothing to undo.");
+	for (int i = 0; i < 3; ++i)
+		rOperator.Key(Qt::Key_Y, Qt::ControlModifier);
+	EXPECT_EQ(Targets(), 2);
+	EXPECT_EQ(rOperator.Property("currentFile", "text").toString(), "Current file: first.qrr");
+	rOperator.Key(Qt::Key_S, Qt::ControlModifier);
+	EXPECT_TRUE(Content("first.qrr")
+	    == CommandLine({"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"),
+	        "--match-file-pose", "--position", "Pelvis:haunch", "--position", "Cranium:skull"}));
+	EXPECT_FALSE(m_pWindow->isWindowModified());
 }
 
 TEST_F(Job, ALegacyFileIsSavedUnderANewName)

@@ -10,6 +10,8 @@
 #include <QComboBox>
 #include <QFileDialog>
 #include <QLineEdit>
+#include <QMenu>
+#include <QMenuBar>
 #include <QQuickItem>
 #include <QQuickWidget>
 #include <QQuickWindow>
@@ -265,6 +267,23 @@ void VOperator::Choose(const QString& i_rName, const QString& i_rEntry)
 	}
 	Key(Qt::Key_Return);
 	EXPECT_EVENTUALLY(Property(i_rName, "currentText").toString() == i_rEntry);
+}
+
+QString VOperator::ChooseInMenu(const char* i_pMenu, const char* i_pAction)
+{
+	auto* const pMenu = m_rWindow.findChild<QMenu*>(i_pMenu);
+	auto* const pAction = m_rWindow.findChild<QAction*>(i_pAction);
+	auto* const pBar = pMenu ? qobject_cast<QMenuBar*>(pMenu->parentWidget()) : nullptr;
+	EXPECT_TRUE(pBar && pAction) << i_pMenu << " " << i_pAction;
+	if (!pBar || !pAction)
+		return {};
+	QTest::mouseClick(m_rWindow.windowHandle(), Qt::LeftButton, {},
+	    pBar->mapTo(&m_rWindow, pBar->actionGeometry(pMenu->menuAction()).center()));
+	EXPECT_EVENTUALLY(pMenu->windowHandle() && pMenu->windowHandle()->isExposed());
+	const QString text = pAction->text();
+	QTest::mouseClick(pMenu->windowHandle(), Qt::LeftButton, {}, pMenu->actionGeometry(pAction).center());
+	EXPECT_EVENTUALLY(!pMenu->isVisible());
+	return text;
 }
 
 void VOperator::ClickRow(const QString& i_rList, int i_Row, Qt::KeyboardModifiers i_Modifiers)

@@ -64,6 +64,9 @@ public:
 	void Fill(const QString& i_rName, const QString& i_rText);
 	/// Opens a box and picks the entry with this text.
 	void Choose(const QString& i_rName, const QString& i_rEntry);
+	/// Opens a menu of the window and clicks an action of it, both by objectName.
+	/// @return the text that the action had there.
+	QString ChooseInMenu(const char* i_pMenu, const char* i_pAction);
 	/// Clicks on a row of a list or table by its number, after scrolling to it.
 	void ClickRow(const QString& i_rList, int i_Row, Qt::KeyboardModifiers i_Modifiers = Qt::NoModifier);
 

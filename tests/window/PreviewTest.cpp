@@ -348,9 +348,17 @@ TEST_F(Preview, TheRootMovesAlongAnArrow)
 	EXPECT_TRUE(Selected("targetSegments", "haunch"));
 	EXPECT_EQ(m_pOperator->Property("unsavedMark", "visible").toBool(), bUnsaved);
 	EXPECT_TRUE(SaveAs("as before.qrr") == m_Created);
+	// One that is undone before it ends, and done again.
 	m_pOperator->Point(from);
 	EXPECT_EVENTUALLY(Sees(from, IsYellow));
-	m_pOperator->Drag({Qt::LeftButton}, from, to);
+	m_pOperator->Press(Qt::LeftButton, from);
+	m_pOperator->Point(from + QPoint(20, 0));
+	m_pOperator->Point(to);
+	m_pOperator->Key(Qt::Key_Z, Qt::ControlModifier);
+	m_pOperator->Point(from + QPoint(0, 40));
+	m_pOperator->Release(Qt::LeftButton, from + QPoint(0, 40));
+	EXPECT_TRUE(SaveAs("as before too.qrr") == m_Created);
+	m_pOperator->Key(Qt::Key_Z, Qt::ControlModifier | Qt::ShiftModifier);
 
 	// How far along the arrow the mouse is: where it comes nearest to it.
 	const auto along = [&](const QPointF& i_rMouse)

@@ -19,6 +19,7 @@ TesselPluginInterface::VHostRules VApplicationObject::Rules() const
 	rules.m_bPoseFromFile = m_pPreferences->Number(c_pPoseFromFileKey, 1) != 0;
 	rules.m_bMirrorChange = true;
 	rules.m_bWheelInFixedViews = true;
+	rules.m_bKeepsHistory = true;
 	return rules;
 }
 

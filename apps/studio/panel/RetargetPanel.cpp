@@ -270,6 +270,40 @@ void VRetargetPanel::New()
 	QMetaObject::invokeMethod(m_pDocument, "NewTargetSubject");
 }
 
+void VRetargetPanel::Undo()
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(m_pDocument, "Undo");
+}
+
+void VRetargetPanel::Redo()
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(m_pDocument, "Redo");
+}
+
+QString VRetargetPanel::UndoName() const
+{
+	return AskDocument("UndoName");
+}
+
+QString VRetargetPanel::RedoName() const
+{
+	return AskDocument("RedoName");
+}
+
+QString VRetargetPanel::AskDocument(const char* i_pQuestion) const
+{
+	QString answer;
+	QMetaObject::invokeMethod(m_pDocument, i_pQuestion, Qt::DirectConnection, Q_RETURN_ARG(QString, answer));
+	return answer;
+}
+
+void VRetargetPanel::EndStep()
+{
+	QMetaObject::invokeMethod(m_pDocument, "EndStep");
+}
+
 void VRetargetPanel::SaveAs()
 {
 	QObject* const pDialog = m_pRoot ? m_pRoot->findChild<QObject*>(QStringLiteral("saveDialog")) : nullptr;

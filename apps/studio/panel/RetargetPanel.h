@@ -68,6 +68,15 @@ public:
 	/// Begins without a target subject and without a file; performer and character stay.
 	void New();
 
+	/// What is being typed is an edit, too.
+	void Undo();
+	void Redo();
+	/// Of the edit that it would be; empty if there is none.
+	QString UndoName() const;
+	QString RedoName() const;
+	/// The next edit is a step of its own, even of the same field.
+	void EndStep();
+
 	/// Empty if there is a target subject.
 	QString WhyNotSave() const;
 
@@ -110,6 +119,7 @@ private:
 	VRetargetPanel(QWidget& i_rPanel, QObject& i_rDocument,
 	    std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters);
 
+	QString AskDocument(const char* i_pQuestion) const;
 	std::shared_ptr<TesselPluginInterface::IParameter> Parameter(const char* i_pName) const;
 	bool SetParameter(const char* i_pName, const QString& i_rPath);
 	void FollowRootItem();

@@ -4,10 +4,12 @@
 #include "TesselPluginInterface/PathTypes.h"
 #include "UtilsFileSystem/Paths.h"
 #include "studio/host/Preferences.h"
+#include "studio/host/QtDispatcher.h"
 #include "studio/host/Services.h"
 #include "studio/panel/FileKind.h"
 #include "studio/panel/RecentFiles.h"
 #include "studio/panel/RetargetPanel.h"
+#include "studio/window/EditKeys.h"
 #include "studio/window/Named.h"
 #include "studio/window/PreferencesDialog.h"
 
@@ -84,6 +86,7 @@ void VStudioWindow::MakeMenus(bool i_bDeveloper)
 {
 	Named(menuBar(), "MenuBar", tr("Menus"));
 	MakeFileMenu();
+	MakeEditMenu();
 	MakeViewMenu(i_bDeveloper);
 	MakeHelpMenu();
 }
@@ -123,6 +126,52 @@ void VStudioWindow::MakeFileMenu()
 	    [this] { ShowPreferences(); });
 	rMenu.addSeparator();
 	AddAction(rMenu, "Quit", tr("&Quit"), QKeySequence::Quit, [this] { close(); });
+}
+
+void VStudioWindow::MakeEditMenu()
+{
+	QMenu& rMenu = *Named(menuBar()->addMenu(tr("&Edit")), "EditMenu", tr("Edit"));
+	QAction* const pUndo =
+	    AddAction(rMenu, "Undo", {}, QKeySequence(QStringLiteral("Ctrl+Z")), [this] { UndoOrRedo(true); });
+	QAction* const pRedo = AddAction(rMenu, "Redo", {}, {}, [this] { UndoOrRedo(false); });
+	pRedo->setShortcuts({QKeySequence(QStringLiteral("Ctrl+Shift+Z")), QKeySequence(QStringLiteral("Ctrl+Y"))});
+	// As with Save: the shortcut tells why nothing happens.
+	connect(&rMenu, &QMenu::aboutToShow, this, [this] { UpdateEditActions(true); });
+	connect(&rMenu, &QMenu::aboutToHide, this, [this] { UpdateEditActions(false); });
+	UpdateEditActions(false);
+	// Behind the edits that are still on their way.
+	new VEditKeys(*this, {pUndo, pRedo},
+	    [this]
+	    {
+		    m_pDispatcher->Post(
+		        [this]
+		        {
+			        if (m_pRetargetPanel)
+				        m_pRetargetPanel->EndStep();
+		        });
+	    });
+}
+
+void VStudioWindow::UndoOrRedo(bool i_bBack)
+{
+	if (!UndoTyping(i_bBack) && m_pRetargetPanel)
+		i_bBack ? m_pRetargetPanel->Undo() : m_pRetargetPanel->Redo();
+}
+
+void VStudioWindow::UpdateEditActions(bool i_bShown)
+{
+	// What is being typed is then the next to be undone.
+	if (i_bShown && m_pRetargetPanel)
+		m_pRetargetPanel->ApplyTyped();
+	const std::tuple<const char*, QString, QString> rows[] = {
+	    {"Undo", tr("&Undo"), i_bShown && m_pRetargetPanel ? m_pRetargetPanel->UndoName() : QString()},
+	    {"Redo", tr("&Redo"), i_bShown && m_pRetargetPanel ? m_pRetargetPanel->RedoName() : QString()}};
+	for (const auto& [pName, rText, rStep] : rows)
+	{
+		auto* const pAction = findChild<QAction*>(QLatin1String(pName));
+		pAction->setText(rStep.isEmpty() ? rText : QStringLiteral("%1 %2").arg(rText, rStep));
+		pAction->setEnabled(!i_bShown || !rStep.isEmpty());
+	}
 }
 
 void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
@@ -244,6 +293,7 @@ void VStudioWindow::ShowMouseAndKeys()
 	           "finely")},
 	    {tr("an arrow or a square corner, dragged"), tr("moves the root of the target subject")},
 	    {tr("Esc"), tr("ends a drag of the manipulator or a rectangle as if it had not begun")},
+	    {tr("Ctrl+Z and Ctrl+Shift+Z"), tr("undo the last edit and do it again")},
 	    {tr("Ctrl++ and Ctrl+-"), tr("make the manipulator larger and smaller")},
 	    {tr("Alt+T and Alt+R"), tr("add a position and a rotation target")}};
 	QString text = tr("<b>In the preview</b>") + QStringLiteral("<table cellpadding='3'>");

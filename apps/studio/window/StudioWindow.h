@@ -65,6 +65,7 @@ protected:
 private:
 	void MakeMenus(bool i_bDeveloper);
 	void MakeFileMenu();
+	void MakeEditMenu();
 	void MakeViewMenu(bool i_bDeveloper);
 	void MakeHelpMenu();
 	QAction* AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText, const QKeySequence& i_rShortcut,
@@ -81,6 +82,11 @@ private:
 	void ShowAbout();
 	/// Names what "Save" would write, or why it is off.
 	void UpdateSaveActions();
+	/// In the text field that is being typed in, else of the target subject.
+	void UndoOrRedo(bool i_bBack);
+	/// Names what they would undo and do again.
+	/// @param i_bShown the menu is open: what can do nothing is off.
+	void UpdateEditActions(bool i_bShown);
 	/// Asks before what another program has written is lost.
 	bool MayOverwrite(const std::string& i_rPath);
 	/// Selects the segments and the target that a message is about; nothing changes if it names none.

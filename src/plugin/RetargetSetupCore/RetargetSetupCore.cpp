@@ -7,6 +7,7 @@
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/RootHeight.h"
+#include "RetargetSetupCore/StepNames.h"
 
 #include <algorithm>
 
@@ -16,7 +17,6 @@ using CoreOrlexTypes::VSubjectParametrised;
 using NVX::CountedPointer;
 using RetargetSetup::c_LogCategory;
 using TesselPluginInterface::IFlowItem;
-using TesselPluginInterface::ItemValue;
 
 namespace
 {
@@ -41,6 +41,7 @@ VRetargetSetupCore::VRetargetSetupCore(std::shared_ptr<TesselPluginInterface::ID
     : m_pDispatcher(std::move(i_pDispatcher)), m_pFrameFactory(std::move(i_pFrameFactory)),
       m_pItemFactory(std::move(i_pItemFactory))
 {
+	m_Target.m_pFile = NewFile();
 }
 
 VRetargetSetupCore::~VRetargetSetupCore() = default;
@@ -58,7 +59,7 @@ TesselPluginInterface::VHostRules VRetargetSetupCore::HostRules() const
 bool VRetargetSetupCore::MayReplaceTarget(const char* i_pCommand, const char* i_pAction)
 {
 	// What a press of the button made, another press makes again.
-	const bool bLoses = HasUnsavedChanges() && TargetDiffersFrom(m_MadeTarget);
+	const bool bLoses = HasUnsavedChanges() && TargetDiffersFrom(m_Target.m_pFile->m_Made);
 	if (!bLoses || !m_pHostRules || m_pHostRules->MayReplaceTargetSubject(i_pAction))
 		return true;
 	CommandIgnored(i_pCommand, RetargetSetup::Ignored::c_TargetKept);
@@ -97,9 +98,13 @@ void VRetargetSetupCore::SetTargetScale(double i_Scale)
 		    lost);
 		return;
 	}
-	m_TargetScale = i_Scale;
 	if (!pOld)
+	{
+		m_Target.m_NextScale = i_Scale;
 		return;
+	}
+	const VStep step(*this, {RetargetSetup::Steps::c_Scale});
+	m_Target.m_NextScale = i_Scale;
 	if (!dropped.empty())
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The new scale drops the dynamic parameters '%1%'", dropped);
 	VSubjectParametrised subject = *pOld;
@@ -114,7 +119,7 @@ void VRetargetSetupCore::SetTargetScale(double i_Scale)
 void VRetargetSetupCore::SetNextTargetScale(double i_Scale)
 {
 	if (RetargetSetup::IsUsableScale(i_Scale))
-		m_TargetScale = i_Scale;
+		m_Target.m_NextScale = i_Scale;
 }
 
 double VRetargetSetupCore::GetTargetScale() const
@@ -161,17 +166,27 @@ void VRetargetSetupCore::SetSourceSubject(
 bool VRetargetSetupCore::SetTargetSubject(VSubjectParametrised i_Parametrised,
     VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras)
 {
+	const VStep step(*this, {});
 	if (!ReplaceTargetItems(std::move(i_Parametrised),
 	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)), NewIdentities()))
 		return false;
-	m_TargetExtras = std::move(i_Extras);
-	m_TargetAtRest = TargetValues();
+	TakeExtras(std::move(i_Extras));
+	m_Target.m_AtRest = TargetValues();
 	return true;
 }
 
-void VRetargetSetupCore::SetTargetSubjectParametrised(VSubjectParametrised i_Parametrised)
+void VRetargetSetupCore::TakeExtras(CoreOrlexQRTIO::VSubjectQRTExtras i_Extras)
 {
-	VIdentities identities = m_Identities;
+	// Most edits leave them as they are.
+	if (!(i_Extras == GetTargetExtras()))
+		m_Target.m_pExtras = std::make_shared<const CoreOrlexQRTIO::VSubjectQRTExtras>(std::move(i_Extras));
+}
+
+void VRetargetSetupCore::SetTargetSubjectParametrised(
+    VSubjectParametrised i_Parametrised, const RetargetSetup::VEdit& i_rEdit)
+{
+	const VStep step(*this, i_rEdit);
+	VIdentities identities = m_Target.m_Identities;
 	if (i_Parametrised.m_Targets.size() != identities.m_Targets.size())
 		identities.m_Targets.clear();
 	ReplaceTargetItems(std::move(i_Parametrised), nullptr, std::move(identities));
@@ -193,34 +208,28 @@ bool VRetargetSetupCore::ReplaceTargetItems(VSubjectParametrised i_Parametrised,
 	while (i_Identities.m_Targets.size() < i_Parametrised.m_Targets.size())
 		i_Identities.m_Targets.push_back(++m_LastIdentity);
 	// The change signal fires within, and whoever hears it may ask.
-	std::swap(m_Identities, i_Identities);
-	if (Replace(m_TargetItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
+	std::swap(m_Target.m_Identities, i_Identities);
+	if (Replace(m_Target.m_Items, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
 	        std::move(i_pApplicationData)))
 	{
 		UnsavedChangesChanged();
 		return true;
 	}
-	std::swap(m_Identities, i_Identities);
+	std::swap(m_Target.m_Identities, i_Identities);
 	return false;
 }
 
 std::uint64_t VRetargetSetupCore::TargetIdentity(std::int32_t i_TargetIndex) const
 {
-	const std::vector<std::uint64_t>& rTargets = m_Identities.m_Targets;
+	const std::vector<std::uint64_t>& rTargets = m_Target.m_Identities.m_Targets;
 	return std::uint32_t(i_TargetIndex) < rTargets.size() ? rTargets[std::size_t(i_TargetIndex)] : 0;
 }
 
 std::int32_t VRetargetSetupCore::TargetOfIdentity(std::uint64_t i_Identity) const
 {
-	const std::vector<std::uint64_t>& rTargets = m_Identities.m_Targets;
+	const std::vector<std::uint64_t>& rTargets = m_Target.m_Identities.m_Targets;
 	const auto found = std::find(rTargets.begin(), rTargets.end(), i_Identity);
 	return found == rTargets.end() ? -1 : std::int32_t(found - rTargets.begin());
-}
-
-VRetargetSetupCore::VSubjectValues VRetargetSetupCore::ValuesOf(const VSubjectItems& i_rItems)
-{
-	return {ItemValue<VSubject>(i_rItems.m_pSubject), ItemValue<VSubjectApplicationData>(i_rItems.m_pApplicationData),
-	    ItemValue<VSubjectParametrised>(i_rItems.m_pParametrised)};
 }
 
 template <typename T>
@@ -263,7 +272,7 @@ void VRetargetSetupCore::Publish()
 	m_pFrame = m_pFrameFactory->CreateFrame();
 	if (m_pFrame)
 	{
-		for (const VSubjectItems* const pItems : {&m_SourceItems, &m_TargetItems})
+		for (const VSubjectItems* const pItems : {&m_SourceItems, &m_Target.m_Items})
 		{
 			m_pFrame->AddItem(pItems->m_pSubject);
 			m_pFrame->AddItem(pItems->m_pApplicationData);

@@ -1,12 +1,10 @@
 #pragma once
 
-#include "CoreOrlexQRTIO/SubjectQRTExtras.h"
-#include "CoreOrlexTypes/Subject.h"
-#include "CoreOrlexTypes/SubjectApplicationData.h"
-#include "CoreOrlexTypes/SubjectParametrised.h"
 #include "FBXIO/SkinSkeleton.h"
 #include "NVX/Signal.h"
 #include "RetargetSetupCore/BindPose.h"
+#include "RetargetSetupCore/History.h"
+#include "RetargetSetupCore/TargetState.h"
 #include "TesselPluginInterface/IDispatcher.h"
 #include "TesselPluginInterface/IFlowFrame.h"
 #include "TesselPluginInterface/IHostRules.h"
@@ -25,24 +23,24 @@ namespace ComputeSubject
 class VComputeSubjectFK;
 }
 
+namespace TesselPluginInterface
+{
+class ISelectionManager;
+}
+
 /// The document of the panel, for programs without one too: the source subject (the performer's skeleton, which is only
 /// read), the target subject (the character's, which is edited and saved) and the FBX skeleton that a target subject is
 /// made from.
 ///
 /// The subjects live in six flow items, which are replaced and never changed. Every change ends in a new frame with the
-/// items and one firing of the change signal. There is no undo. What an operation needs and does not find (a subject,
-/// an index) ends it with no change. Commands return nothing: one that changed nothing says why by CommandIgnored, and
-/// what else the operator ought to know goes to the log. All of it runs on the user interface thread.
+/// items and one firing of the change signal. What an operation needs and does not find (a subject, an index) ends it
+/// with no change. Commands return nothing: one that changed nothing says why by CommandIgnored, and what else the
+/// operator ought to know goes to the log. What edits of the target subject replace is kept for Undo where a program
+/// asks for it by KeepHistory. All of it runs on the user interface thread.
 class VRetargetSetupCore
 {
 public:
-	/// A subject in its three forms. Null what there is not; shared, and never changed.
-	struct VSubjectValues
-	{
-		std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubject;
-		std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> m_pApplicationData;
-		std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pParametrised;
-	};
+	using VSubjectValues = RetargetSetup::VSubjectValues;
 
 	VRetargetSetupCore(std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
 	    NVX::CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory,
@@ -55,6 +53,29 @@ public:
 	void SetHostRules(std::shared_ptr<TesselPluginInterface::IHostRules> i_pRules);
 	/// As the host has them now.
 	TesselPluginInterface::VHostRules HostRules() const;
+
+	/// From now on what an edit of the target subject replaces is kept, so that Undo brings it back. Making, loading
+	/// and beginning anew are edits, too; a save and the source subject are not.
+	/// @param i_pSelection what is selected of the document comes back through the dispatcher; null leaves it alone.
+	/// @param i_MostBytes that old states may take, about; that the oldest go is told once.
+	void KeepHistory(std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelection,
+	    std::size_t i_MostBytes = RetargetSetup::c_HistoryBytes);
+
+	/// Brings back what was before the last edit, with its file and what counts as saved of it; numbers of targets come
+	/// back, too.
+	void Undo() { Move(true); }
+	/// The other way; an edit ends that.
+	void Redo() { Move(false); }
+
+	/// What comes after is a step of its own, even if it goes on with the same drag or field.
+	void EndStep();
+
+	/// The name of what Undo and Redo would bring back or do again; empty if there is nothing.
+	std::string UndoName() const { return StepName(true); }
+	std::string RedoName() const { return StepName(false); }
+
+	/// Fires at the beginning of Undo and Redo: whoever is in the middle of an edit ends it there.
+	NVX::VSignal<>& GetLeavingSignal() { return m_LeavingSignal; }
 
 	/// Makes the target subject anew from the FBX skeleton, from the root bone on and with the target scale. Targets,
 	/// joint edits and bind poses of the one before are lost. It is of no file.
@@ -91,7 +112,7 @@ public:
 
 	/// The height of the root above the floor is scaled with the lengths: at once when this changes, and whenever the
 	/// scale does.
-	bool ScaleRootHeight() const { return m_bScaleRootHeight; }
+	bool ScaleRootHeight() const { return m_Target.m_bScaleRootHeight; }
 	void SetScaleRootHeight(bool i_bScale);
 
 	/// Reads the skeleton that CreateTargetSubject uses; no subject changes. False if the file cannot be read, then the
@@ -130,6 +151,7 @@ public:
 	/// The scale of the next CreateTargetSubject, with no change of the target subject that is there. What
 	/// SetTargetScale refuses is ignored.
 	void SetNextTargetScale(double i_Scale);
+	double GetNextTargetScale() const { return m_Target.m_NextScale; }
 
 	/// The present target subject's; 1 without one.
 	double GetTargetScale() const;
@@ -166,11 +188,12 @@ public:
 
 	/// An edit that leaves the application data and the extras as they are. The targets stay the ones that they are if
 	/// there are as many as before.
-	void SetTargetSubjectParametrised(CoreOrlexTypes::VSubjectParametrised i_Parametrised);
+	void SetTargetSubjectParametrised(
+	    CoreOrlexTypes::VSubjectParametrised i_Parametrised, const RetargetSetup::VEdit& i_rEdit = {});
 
 	/// The values without copies.
-	VSubjectValues SourceValues() const { return ValuesOf(m_SourceItems); }
-	VSubjectValues TargetValues() const { return ValuesOf(m_TargetItems); }
+	VSubjectValues SourceValues() const { return RetargetSetup::ValuesOf(m_SourceItems); }
+	VSubjectValues TargetValues() const { return RetargetSetup::ValuesOf(m_Target.m_Items); }
 
 	/// What the targets are told apart by, whatever places they move to: one that is removed takes its number along. A
 	/// subject that replaces another brings new ones. 0 for a target that is not there.
@@ -178,10 +201,10 @@ public:
 	/// Where the target stands now; -1 if it is gone.
 	std::int32_t TargetOfIdentity(std::uint64_t i_Identity) const;
 	/// Another one after each subject that was made, loaded or set as a whole; 0 without a target subject.
-	std::uint64_t TargetSubjectIdentity() const { return m_Identities.m_Subject; }
+	std::uint64_t TargetSubjectIdentity() const { return m_Target.m_Identities.m_Subject; }
 
 	/// The target subject as it was made, loaded or given the pose of its FBX file, whichever was last.
-	const VSubjectValues& TargetAtRest() const { return m_TargetAtRest; }
+	const VSubjectValues& TargetAtRest() const { return m_Target.m_AtRest; }
 
 	/// Copies; false, with nothing copied, if there is none.
 	bool GetSourceTemplate(CoreOrlexTypes::VSubject& o_rSubject) const;
@@ -192,7 +215,7 @@ public:
 	    CoreOrlexTypes::VSubjectApplicationData& o_rApplicationData) const;
 
 	/// What the target subject's file holds beyond the subject; empty for a subject that was made here.
-	const CoreOrlexQRTIO::VSubjectQRTExtras& GetTargetExtras() const { return m_TargetExtras; }
+	const CoreOrlexQRTIO::VSubjectQRTExtras& GetTargetExtras() const { return *m_Target.m_pExtras; }
 
 	/// Stem of the source skeleton's file, or what the target subject's file tells of it.
 	const std::string& GetSourceName() const { return m_SourceName; }
@@ -233,6 +256,9 @@ protected:
 	virtual void ScaleRootHeightChanged() {}
 	/// With each change of the target subject and each save.
 	virtual void UnsavedChangesChanged() {}
+	/// After Undo and Redo.
+	/// @param i_rFile that the target subject is of now, empty for none.
+	virtual void TargetSubjectBroughtBack(const boost::filesystem::path& /*i_rFile*/) {}
 	/// After CreateTargetSubject.
 	virtual void TargetSubjectCreated() {}
 	/// AddTarget has found the target that it was to add.
@@ -243,22 +269,35 @@ protected:
 	virtual void CommandIgnored(const char* /*i_pCommand*/, const std::string& /*i_rReason*/) {}
 
 private:
-	struct VSubjectItems
+	using VSubjectItems = RetargetSetup::VSubjectItems;
+	using VIdentities = RetargetSetup::VIdentities;
+
+	/// An edit of the target subject, from where nothing of it has changed to where all has: the two are a step of the
+	/// history, unless they hold the same. One within another is part of it.
+	class VStep
 	{
-		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pSubject;
-		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pApplicationData;
-		NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pParametrised;
+	public:
+		VStep(VRetargetSetupCore& io_rDocument, const RetargetSetup::VEdit& i_rEdit);
+		~VStep();
+		VStep(const VStep&) = delete;
+		VStep& operator=(const VStep&) = delete;
+
+	private:
+		VRetargetSetupCore& m_rDocument;
+		const RetargetSetup::VEdit m_Edit;
+		const bool m_bOutermost;
+		std::optional<RetargetSetup::VTargetState> m_Before;
 	};
+
+	void Move(bool i_bBack);
+	std::string StepName(bool i_bBack) const;
+	/// What is selected of the document, none without a selection manager.
+	std::vector<NVX::ISelectionItem> Selected() const;
+	void SelectSoon(std::vector<NVX::ISelectionItem> i_Items) const;
 
 	/// SaveTargetSubject.
 	/// @param o_rReason why it failed.
 	std::uint32_t Save(const boost::filesystem::path& i_rPath, std::string& o_rReason);
-
-	struct VIdentities
-	{
-		std::uint64_t m_Subject = 0;
-		std::vector<std::uint64_t> m_Targets;
-	};
 
 	/// Asks the host before changes that are not saved are lost. False, and the command is ignored, if they stay.
 	/// @param i_pAction the command in the operator's words.
@@ -267,8 +306,11 @@ private:
 	/// False without a target subject.
 	bool TargetDiffersFrom(const VSubjectValues& i_rKept) const;
 
-	/// Keeps what the target subject's file holds from now on.
-	void RememberTargetFile(const boost::filesystem::path& i_rPath);
+	/// For a target subject that takes the place of another.
+	std::shared_ptr<RetargetSetup::VTargetFile> NewFile();
+	/// The target subject is of this file from now on.
+	/// @param i_Saved what the file holds of it.
+	void RememberTargetFile(const boost::filesystem::path& i_rPath, VSubjectValues i_Saved);
 	/// Asks the host before a change of another program is overwritten.
 	bool MayOverwrite(const boost::filesystem::path& i_rPath) const;
 
@@ -281,6 +323,7 @@ private:
 	bool ReplaceTargetItems(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
 	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities);
 	VIdentities NewIdentities() { return {++m_LastIdentity, {}}; }
+	void TakeExtras(CoreOrlexQRTIO::VSubjectQRTExtras i_Extras);
 
 	/// The source subject at rest in its bind pose; null if it has none. Kept until the source subject is another one.
 	const ComputeSubject::VComputeSubjectFK* SourceKinematics();
@@ -290,9 +333,7 @@ private:
 	FBXIO::VSkinSkeleton BonesOfTarget() const;
 	void UpdatePoseNote();
 	/// What the root's height is multiplied by at a scale.
-	double RootFactor(double i_Scale) const { return m_bScaleRootHeight ? i_Scale : 1.0; }
-
-	static VSubjectValues ValuesOf(const VSubjectItems& i_rItems);
+	double RootFactor(double i_Scale) const { return ScaleRootHeight() ? i_Scale : 1.0; }
 
 	/// Replaces the items of one subject and publishes.
 	/// @param i_pApplicationData null keeps the item that is there.
@@ -316,29 +357,25 @@ private:
 	std::string m_ShownSourceName;
 	std::string m_PoseNote;
 	VSubjectItems m_SourceItems;
-	VSubjectItems m_TargetItems;
+	RetargetSetup::VTargetState m_Target;
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame;
 	Rotation::VMatrix4 m_TargetAxisMatrix;
 	std::uint32_t m_TargetRootIndex = 0;
-	double m_TargetScale = 1.0;
 	bool m_bJointSymmetry = true;
-	bool m_bScaleRootHeight = false;
 	NVX::VSignal<> m_ChangedSignal;
 
-	/// What the file held when it was last loaded or saved.
-	VSubjectValues m_SavedTarget;
-	/// Where that file is, and a digest of what it held then; none for no file.
-	boost::filesystem::path m_TargetFile;
-	std::optional<std::size_t> m_TargetFileDigest;
-	/// As CreateTargetSubject left it.
-	VSubjectValues m_MadeTarget;
-
-	VSubjectValues m_TargetAtRest;
+	/// Of the target subject and of those that Undo and Redo bring back.
+	std::vector<std::weak_ptr<RetargetSetup::VTargetFile>> m_Files;
+	/// Nothing where no history is kept.
+	std::optional<RetargetSetup::VHistory> m_History;
+	std::shared_ptr<TesselPluginInterface::ISelectionManager> m_pSelection;
+	NVX::VSignal<> m_LeavingSignal;
+	/// Within a step.
+	bool m_bInStep = false;
+	bool m_bForgotTold = false;
 
 	std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pSourceFK;
 	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSubjectOfSourceFK;
-	CoreOrlexQRTIO::VSubjectQRTExtras m_TargetExtras;
-	VIdentities m_Identities;
 	std::uint64_t m_LastIdentity = 0;
 	bool m_bTargetFBXComplete = true;
 	/// The root bone was chosen since the FBX file was read.

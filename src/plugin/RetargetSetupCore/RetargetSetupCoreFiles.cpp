@@ -16,6 +16,7 @@
 #include "RetargetSetupCore/LegacyText.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RootHeight.h"
+#include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupCore/TargetConstruction.h"
 #include "UtilsFileSystem/Files.h"
 #include "UtilsFileSystem/Paths.h"
@@ -33,7 +34,10 @@ using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
 using CoreOrlexTypes::VSubjectRecord;
 using RetargetSetup::c_LogCategory;
+using RetargetSetup::VTargetFile;
+using RetargetSetup::VTargetState;
 namespace Ignored = RetargetSetup::Ignored;
+namespace Steps = RetargetSetup::Steps;
 
 namespace
 {
@@ -85,13 +89,6 @@ void TellSourceOfSaved(const std::string& i_rNamed, const std::string& i_rShown)
 	else if (i_rNamed != i_rShown)
 		NVX_LOG(c_LogCategory, NVX::ELogWarning,
 		    "The saved subject names source skeleton '%1%', and the one that is shown is '%2%'", i_rNamed, i_rShown);
-}
-
-/// Both are kept as they were handed out, so that most are the same objects.
-template <typename T>
-bool Differ(const std::shared_ptr<const T>& i_rpA, const std::shared_ptr<const T>& i_rpB)
-{
-	return i_rpA != i_rpB && (!i_rpA || !i_rpB || !(*i_rpA == *i_rpB));
 }
 
 /// Of what a file holds; none if it cannot be read.
@@ -181,7 +178,7 @@ void VRetargetSetupCore::CreateTargetSubject()
 	applicationData.m_Skin = m_TargetName;
 	applicationData.m_RetargetSourceTemplate = m_SourceName;
 	RetargetSetup::BuildTargetSubject(*pSkeleton, subject, applicationData, m_TargetRootIndex);
-	RetargetSetup::SetGlobalScale(subject, m_TargetScale);
+	RetargetSetup::SetGlobalScale(subject, m_Target.m_NextScale);
 	if (subject.m_Segments.empty())
 	{
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The FBX skeleton has no bone %1% to begin with: nothing is made",
@@ -195,16 +192,16 @@ void VRetargetSetupCore::CreateTargetSubject()
 	const bool bRootChosen = m_bTargetRootChosen;
 	const bool bPoseFromFile = HostRules().m_bPoseFromFile;
 	const double rootFactor = RootFactor(RetargetSetup::GetGlobalScale(subject));
-	if (!MayReplaceTarget(c_Command, "Create Target Subject"))
+	if (!MayReplaceTarget(c_Command, Steps::c_Create))
 		return;
 	if (!bRootChosen)
 		TellOtherRoots(*pSkeleton);
 	if (!bPoseFromFile)
 		TellTwiceTurnedRoot(rRootBone);
 	if (const auto pBefore = TargetValues().m_pApplicationData;
-	    pBefore && pBefore->m_Skin != m_TargetName && m_TargetScale != 1.0)
+	    pBefore && pBefore->m_Skin != m_TargetName && m_Target.m_NextScale != 1.0)
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "'%1%' is made with the scale %2%, which was that of '%3%'",
-		    m_TargetName, m_TargetScale, pBefore->m_Skin);
+		    m_TargetName, m_Target.m_NextScale, pBefore->m_Skin);
 
 	const std::optional<Rotation::VVector3> rotation = RetargetSetup::RotationOf(world);
 	if (!rotation && !bPoseFromFile)
@@ -223,10 +220,11 @@ void VRetargetSetupCore::CreateTargetSubject()
 	else if (rootFactor != 1.0)
 		RetargetSetup::ScaleRootHeight(subject, rootFactor);
 	RetargetSetup::TellLowestSegment(subject, rootFactor);
+	const VStep step(*this, {Steps::c_Create});
 	if (!SetTargetSubject(std::move(subject), std::move(applicationData)))
 		return CommandIgnored(c_Command, Ignored::c_HostRefused);
-	m_MadeTarget = TargetValues();
-	m_SavedTarget = {};
+	m_Target.m_pFile = NewFile();
+	m_Target.m_pFile->m_Made = TargetValues();
 	UnsavedChangesChanged();
 	TargetSubjectCreated();
 }
@@ -236,13 +234,16 @@ void VRetargetSetupCore::NewTargetSubject()
 	constexpr const char* c_Command = "NewTargetSubject";
 	if (!TargetValues().m_pParametrised)
 		return CommandIgnored(c_Command, Ignored::c_NoTarget);
-	if (!MayReplaceTarget(c_Command, "New Retarget Subject"))
+	if (!MayReplaceTarget(c_Command, Steps::c_New))
 		return;
-	m_TargetItems = {};
-	m_TargetExtras = {};
-	m_SavedTarget = {};
-	m_MadeTarget = {};
+	const VStep step(*this, {Steps::c_New});
+	VTargetState none;
+	none.m_pFile = NewFile();
+	none.m_NextScale = m_Target.m_NextScale;
+	none.m_bScaleRootHeight = m_Target.m_bScaleRootHeight;
+	m_Target = std::move(none);
 	Publish();
+	UnsavedChangesChanged();
 }
 
 bool VRetargetSetupCore::LoadSourceSubject(const boost::filesystem::path& i_rPath, const std::string& i_rSkinName)
@@ -288,15 +289,16 @@ std::uint32_t VRetargetSetupCore::LoadTargetSubject(const boost::filesystem::pat
 	if (RetargetSetup::LacksBindPose(rSubject))
 		RetargetSetup::AdoptTPoseAsBindPose(rSubject);
 	std::string sourceName = rApplicationData.m_RetargetSourceTemplate;
+	const VStep step(*this, {.m_pName = Steps::c_Load, .m_bNamesSource = true});
 	if (!ReplaceTargetItems(std::move(rSubject),
 	        std::make_shared<const VSubjectApplicationData>(std::move(rApplicationData)), NewIdentities()))
 		return NVX::Status::c_Failure;
-	m_TargetExtras = std::move(extras);
+	TakeExtras(std::move(extras));
 	m_SourceName = std::move(sourceName);
-	m_SavedTarget = TargetValues();
-	m_TargetAtRest = m_SavedTarget;
+	m_Target.m_AtRest = TargetValues();
+	m_Target.m_pFile = NewFile();
+	RememberTargetFile(i_rPath, TargetValues());
 	UnsavedChangesChanged();
-	RememberTargetFile(i_rPath);
 	return NVX::Status::c_Success;
 }
 
@@ -314,7 +316,7 @@ std::uint32_t VRetargetSetupCore::Save(const boost::filesystem::path& i_rPath, s
 	TellNamesUsedTwice(*target.m_pParametrised);
 	std::vector<std::string> errors;
 	const std::uint32_t status = CoreOrlexQRTIO::VWriter().Write(i_rPath, *target.m_pParametrised,
-	    *target.m_pApplicationData, m_TargetExtras, CoreOrlexQRTIO::c_AutomaticVersion, &errors,
+	    *target.m_pApplicationData, GetTargetExtras(), CoreOrlexQRTIO::c_AutomaticVersion, &errors,
 	    [&](const std::string& i_rText) {
 		    return ReadsBack({*target.m_pParametrised, *target.m_pApplicationData}, i_rText, o_rReason);
 	    });
@@ -325,9 +327,8 @@ std::uint32_t VRetargetSetupCore::Save(const boost::filesystem::path& i_rPath, s
 	}
 	if (status == NVX::Status::c_Success)
 	{
-		m_SavedTarget = target;
+		RememberTargetFile(i_rPath, target);
 		UnsavedChangesChanged();
-		RememberTargetFile(i_rPath);
 	}
 	return status;
 }
@@ -340,8 +341,8 @@ bool VRetargetSetupCore::WriteCopy(const boost::filesystem::path& i_rPath, std::
 	std::vector<std::string> warnings;
 	if (!target.m_pParametrised || !target.m_pApplicationData)
 		o_rReason = Ignored::c_NoTarget;
-	else if (!CoreOrlexQRTIO::VWriter().WriteText(*target.m_pParametrised, *target.m_pApplicationData, m_TargetExtras,
-	             CoreOrlexQRTIO::c_AutomaticVersion, text, errors, warnings))
+	else if (!CoreOrlexQRTIO::VWriter().WriteText(*target.m_pParametrised, *target.m_pApplicationData,
+	             GetTargetExtras(), CoreOrlexQRTIO::c_AutomaticVersion, text, errors, warnings))
 		o_rReason = errors.empty() ? std::string() : errors.front();
 	else
 		return UtilsFileSystem::SaveFile(i_rPath, text, o_rReason) == NVX::Status::c_Success;
@@ -353,13 +354,15 @@ std::uint32_t VRetargetSetupCore::RestoreTargetSubject(
 {
 	if (const std::uint32_t status = LoadTargetSubject(i_rCopy))
 		return status;
-	m_SavedTarget = {};
-	m_MadeTarget = {};
-	RememberTargetFile(i_rFile);
+	// Nothing to go back to: what is there now is what was left.
+	if (m_History)
+		m_History->Clear();
+	RememberTargetFile(i_rFile, {});
+	std::optional<std::size_t>& rDigest = m_Target.m_pFile->m_Digest;
 	boost::system::error_code error;
 	const std::time_t written = boost::filesystem::last_write_time(i_rFile, error);
-	if (!error && m_TargetFileDigest && written > boost::filesystem::last_write_time(i_rCopy, error))
-		m_TargetFileDigest = ~*m_TargetFileDigest;
+	if (!error && rDigest && written > boost::filesystem::last_write_time(i_rCopy, error))
+		rDigest = ~*rDigest;
 	UnsavedChangesChanged();
 	return NVX::Status::c_Success;
 }
@@ -367,33 +370,41 @@ std::uint32_t VRetargetSetupCore::RestoreTargetSubject(
 bool VRetargetSetupCore::TargetDiffersFrom(const VSubjectValues& i_rKept) const
 {
 	const VSubjectValues target = TargetValues();
-	return target.m_pParametrised
-	    && (Differ(target.m_pParametrised, i_rKept.m_pParametrised)
-	        || Differ(target.m_pApplicationData, i_rKept.m_pApplicationData));
+	return target.m_pParametrised && RetargetSetup::Differ(target, i_rKept);
 }
 
-void VRetargetSetupCore::RememberTargetFile(const boost::filesystem::path& i_rPath)
+void VRetargetSetupCore::RememberTargetFile(const boost::filesystem::path& i_rPath, VSubjectValues i_Saved)
 {
-	m_TargetFile = i_rPath;
-	m_TargetFileDigest = DigestOf(i_rPath);
+	VTargetFile& rFile = *m_Target.m_pFile;
+	rFile.m_Path = i_rPath;
+	rFile.m_Digest = DigestOf(i_rPath);
+	rFile.m_Saved = std::move(i_Saved);
+	// Another subject may be of it, too.
+	for (const auto& rpOther : m_Files)
+		if (const auto pOther = rpOther.lock(); pOther && pOther != m_Target.m_pFile && pOther->m_Path == i_rPath)
+		{
+			pOther->m_Digest = rFile.m_Digest;
+			pOther->m_Saved = rFile.m_Saved;
+		}
 }
 
 bool VRetargetSetupCore::MayOverwrite(const boost::filesystem::path& i_rPath) const
 {
-	if (!m_pHostRules || i_rPath != m_TargetFile || !m_TargetFileDigest)
+	const VTargetFile& rFile = *m_Target.m_pFile;
+	if (!m_pHostRules || i_rPath != rFile.m_Path || !rFile.m_Digest)
 		return true;
 	const std::optional<std::size_t> now = DigestOf(i_rPath);
-	return !now || now == m_TargetFileDigest || m_pHostRules->MayOverwriteChangedFile(UtilsFileSystem::ToUtf8(i_rPath));
+	return !now || now == rFile.m_Digest || m_pHostRules->MayOverwriteChangedFile(UtilsFileSystem::ToUtf8(i_rPath));
 }
 
 bool VRetargetSetupCore::HasUnsavedChanges() const
 {
-	return TargetDiffersFrom(m_SavedTarget);
+	return TargetDiffersFrom(m_Target.m_pFile->m_Saved);
 }
 
 bool VRetargetSetupCore::LoadTargetSubjectBy(const char* i_pCommand, const boost::filesystem::path& i_rPath)
 {
-	if (!MayReplaceTarget(i_pCommand, "Load"))
+	if (!MayReplaceTarget(i_pCommand, Steps::c_Load))
 		return false;
 	const char* pReason = Ignored::c_NotRead;
 	switch (LoadTargetSubject(i_rPath))

@@ -6,6 +6,7 @@
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RootHeight.h"
+#include "RetargetSetupCore/StepNames.h"
 
 #include <boost/format.hpp>
 
@@ -50,17 +51,21 @@ void VRetargetSetupCore::MatchFilePose()
 		return CommandIgnored(c_Command, Ignored::c_OwnJoints);
 	VSubjectParametrised subject = *target.m_pParametrised;
 	RetargetSetup::MatchFilePoseAndTell(subject, bones, m_TargetAxisMatrix, RootFactor(GetTargetScale()));
-	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities))
-		m_TargetAtRest = TargetValues();
+	const VStep step(*this, {RetargetSetup::Steps::c_MatchFilePose});
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities))
+		m_Target.m_AtRest = TargetValues();
 }
 
 void VRetargetSetupCore::SetScaleRootHeight(bool i_bScale)
 {
-	if (i_bScale == m_bScaleRootHeight)
+	if (i_bScale == ScaleRootHeight())
 		return;
+	std::optional<VStep> step;
+	if (TargetValues().m_pParametrised)
+		step.emplace(*this, RetargetSetup::VEdit{RetargetSetup::Steps::c_ScaleRootHeight});
 	const double scale = GetTargetScale();
 	const double before = RootFactor(scale);
-	m_bScaleRootHeight = i_bScale;
+	m_Target.m_bScaleRootHeight = i_bScale;
 	ScaleRootHeightChanged();
 	const auto pTarget = TargetValues().m_pParametrised;
 	if (!pTarget || scale == 1.0)

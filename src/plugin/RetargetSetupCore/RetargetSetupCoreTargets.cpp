@@ -10,6 +10,7 @@
 #include "RetargetSetupCore/Partner.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
+#include "RetargetSetupCore/StepNames.h"
 
 #include <cmath>
 #include <numbers>
@@ -20,6 +21,7 @@ using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
 using RetargetSetup::c_LogCategory;
 namespace Ignored = RetargetSetup::Ignored;
+namespace Steps = RetargetSetup::Steps;
 
 namespace
 {
@@ -149,8 +151,9 @@ void VRetargetSetupCore::AddTarget(
 	for (const std::int32_t index : found)
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "There is a target '%1%' already: only the other side is added",
 		    nameOf(index));
+	const VStep step(*this, {Steps::c_AddTarget});
 	ReplaceTarget(c_Command, std::move(subject),
-	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), m_Identities);
+	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), m_Target.m_Identities);
 }
 
 void VRetargetSetupCore::RemoveTarget(int i_TargetIndex)
@@ -163,7 +166,8 @@ void VRetargetSetupCore::RemoveTarget(int i_TargetIndex)
 	if (std::uint32_t(i_TargetIndex) >= subject.m_Targets.size())
 		return CommandIgnored(c_Command, Ignored::c_NoSelectedTarget);
 	RetargetSetup::RemoveTarget(subject, applicationData, std::uint32_t(i_TargetIndex));
-	VIdentities identities = m_Identities;
+	VIdentities identities = m_Target.m_Identities;
+	const VStep step(*this, {Steps::c_RemoveTarget});
 	identities.m_Targets.erase(identities.m_Targets.begin() + i_TargetIndex);
 	ReplaceTarget(c_Command, std::move(subject),
 	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), std::move(identities));
@@ -186,7 +190,8 @@ void VRetargetSetupCore::UpdateTargets()
 		return CommandIgnored(c_Command, Ignored::c_TargetNoTree);
 	VSubjectParametrised subject = *target.m_pParametrised;
 	RetargetSetup::UpdateTargetStates(*pSourceFK, *pTargetFK, *source.m_pParametrised, subject);
-	ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities);
+	const VStep step(*this, {Steps::c_UpdateTargets});
+	ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities);
 }
 
 void VRetargetSetupCore::CreateAllJoints()
@@ -196,10 +201,11 @@ void VRetargetSetupCore::CreateAllJoints()
 	if (!IsWhole(target))
 		return CommandIgnored(c_Command, Ignored::c_NoTarget);
 	VSubjectParametrised subject = *target.m_pParametrised;
-	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras = GetTargetExtras();
 	RetargetSetup::EnableAllJoints(subject, extras);
-	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities))
-		m_TargetExtras = std::move(extras);
+	const VStep step(*this, {Steps::c_CreateAllJoints});
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities))
+		TakeExtras(std::move(extras));
 }
 
 void VRetargetSetupCore::RemoveUnnecessaryJoints()
@@ -209,10 +215,11 @@ void VRetargetSetupCore::RemoveUnnecessaryJoints()
 	if (!IsWhole(target))
 		return CommandIgnored(c_Command, Ignored::c_NoTarget);
 	VSubjectParametrised subject = *target.m_pParametrised;
-	CoreOrlexQRTIO::VSubjectQRTExtras extras = m_TargetExtras;
+	CoreOrlexQRTIO::VSubjectQRTExtras extras = GetTargetExtras();
 	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
 	if (const auto pBefore = RetargetSetup::KinematicsInBindPose(*target.m_pParametrised, *target.m_pSubject, "target"))
 		TellChangedPose(*pBefore, subject);
-	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Identities))
-		m_TargetExtras = std::move(extras);
+	const VStep step(*this, {Steps::c_RemoveJoints});
+	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities))
+		TakeExtras(std::move(extras));
 }

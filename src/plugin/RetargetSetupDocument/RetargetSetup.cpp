@@ -37,6 +37,12 @@ void VRetargetSetup::CommandIgnored(const char* i_pCommand, const std::string& i
 	emit commandIgnored(i_pCommand, QString::fromStdString(i_rReason));
 }
 
+void VRetargetSetup::TargetSubjectBroughtBack(const boost::filesystem::path& i_rFile)
+{
+	emit targetSubjectBroughtBack(
+	    i_rFile.empty() ? QUrl() : QUrl::fromLocalFile(QString::fromStdString(UtilsFileSystem::ToUtf8(i_rFile))));
+}
+
 boost::filesystem::path VRetargetSetup::LocalPath(const char* i_pCommand, const QUrl& i_rFileURL)
 {
 	// Empty for any other URL.

@@ -46,6 +46,14 @@ public:
 	Q_INVOKABLE void UpdateTargets() { VRetargetSetupCore::UpdateTargets(); }
 	Q_INVOKABLE bool HasUnsavedChanges() const { return VRetargetSetupCore::HasUnsavedChanges(); }
 
+	// For a host that offers Undo and Redo.
+
+	Q_INVOKABLE void Undo() { VRetargetSetupCore::Undo(); }
+	Q_INVOKABLE void Redo() { VRetargetSetupCore::Redo(); }
+	Q_INVOKABLE QString UndoName() const { return QString::fromStdString(VRetargetSetupCore::UndoName()); }
+	Q_INVOKABLE QString RedoName() const { return QString::fromStdString(VRetargetSetupCore::RedoName()); }
+	Q_INVOKABLE void EndStep() { VRetargetSetupCore::EndStep(); }
+
 	/// For a host that keeps what is unsaved. False, with the reason told in the log, if it could not be written.
 	Q_INVOKABLE bool WriteCopyURL(const QUrl& i_rFileURL) const;
 	/// What was kept is unsaved work on the file again, which may be empty.
@@ -75,6 +83,10 @@ signals:
 	/// After CreateTargetSubject.
 	void targetSubjectCreated();
 
+	/// After Undo and Redo.
+	/// @param i_rFileURL of the target subject that is there now; empty if it is of no file.
+	void targetSubjectBroughtBack(const QUrl& i_rFileURL);
+
 	/// AddTarget has found the target that it was to add.
 	void targetFound(int i_TargetIndex);
 
@@ -92,6 +104,7 @@ private:
 	void UnsavedChangesChanged() override { emit unsavedChangesChanged(); }
 	void TargetSubjectCreated() override { emit targetSubjectCreated(); }
 	void TargetFound(int i_TargetIndex) override { emit targetFound(i_TargetIndex); }
+	void TargetSubjectBroughtBack(const boost::filesystem::path& i_rFile) override;
 	void CommandIgnored(const char* i_pCommand, const std::string& i_rReason) override;
 
 	/// Empty, and the command is ignored, if the URL is not of a local file.

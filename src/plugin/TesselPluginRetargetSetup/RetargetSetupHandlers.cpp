@@ -7,6 +7,7 @@
 #include "RetargetSetupCore/FilePath.h"
 #include "RetargetSetupCore/GlobalScale.h"
 #include "RetargetSetupCore/Identity.h"
+#include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupCore/TargetConstruction.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "RetargetSetupDocument/RetargetSetupSelection.h"
@@ -259,10 +260,13 @@ void VRetargetSetupWidget::OnTargetParametersChanged()
 			return OnSelectionChangedShowTarget();
 		}
 	}
+	const char* const pName = shown.m_State == edited.m_State ? RetargetSetup::Steps::c_Weight
+	    : IsSame(shown.m_Weight, edited.m_Weight)             ? RetargetSetup::Steps::c_State
+	                                                          : RetargetSetup::Steps::c_TargetFields;
 	VSubjectParametrised subject = *pSubject;
 	RetargetSetup::ApplyEdits(subject, shown, edited);
-	// What was refused is shown as it is again by the change that follows.
-	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject));
+	// What was refused is shown as it is again by the change that follows. The way of a slider is one step.
+	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject), {pName, m_ShownIdentity});
 }
 
 void VRetargetSetupWidget::OnFolderPreferenceChanged(const std::string& i_rKey)
@@ -326,17 +330,20 @@ void VRetargetSetupWidget::UpdateRemarks()
 
 void VRetargetSetupWidget::SyncScaleParameter()
 {
-	if (!m_pRetargetSetup->TargetValues().m_pParametrised)
-		return;
+	const bool bSubject = m_pRetargetSetup->TargetValues().m_pParametrised != nullptr;
 	m_ScaledSubject = m_pRetargetSetup->TargetSubjectIdentity();
-	const double scale = m_pRetargetSetup->GetTargetScale();
+	double shown = 0.0;
+	const bool bShown = m_Parameters.m_pTargetScale->Get(shown);
+	if (!bSubject && !bShown)
+		return;
+	// Without a subject the one that the next is made with, which may have come back with what was undone.
+	const double scale = bSubject ? m_pRetargetSetup->GetTargetScale() : m_pRetargetSetup->GetNextTargetScale();
 	if (!m_AgreedScale || !IsSame(*m_AgreedScale, scale))
 	{
 		m_AgreedScale = scale;
 		m_pRetargetSetup->SetNextTargetScale(scale);
 	}
-	double shown = 0.0;
-	if (!m_Parameters.m_pTargetScale->Get(shown) || !IsSame(shown, scale))
+	if (!bShown || !IsSame(shown, scale))
 		m_Parameters.m_pTargetScale->Set(scale);
 }
 

@@ -9,6 +9,7 @@
 #include "RetargetSetupCore/Mirror.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
+#include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupDocument/StaleSelection.h"
 #include "SetupProposal/Side.h"
 #include "TesselPluginInterface/ISelectionManager.h"
@@ -34,14 +35,6 @@ constexpr std::uint32_t c_Rings = 4;
 ISelectionItem TargetSegment(std::size_t i_Index)
 {
 	return {NVX::ESelectionTargetSegment, RetargetSetup::c_SubjectId, std::uint32_t(i_Index), {}};
-}
-
-/// A segment or a target of the document's subjects.
-bool IsOfSetup(const ISelectionItem& i_rItem)
-{
-	return i_rItem.m_SubjectId == RetargetSetup::c_SubjectId
-	    && (i_rItem.m_Kind == NVX::ESelectionSourceSegment || i_rItem.m_Kind == NVX::ESelectionTargetSegment
-	        || i_rItem.m_Kind == NVX::ESelectionTarget);
 }
 
 } // namespace
@@ -113,7 +106,7 @@ void VRetargetSetupScene::RememberPointedAt()
 {
 	m_Pointed = {};
 	for (const ISelectionItem& rItem : SelectionManager()->PreSelection().Items())
-		if (IsOfSetup(rItem))
+		if (RetargetSetup::IsOfDocument(rItem))
 			m_Pointed = rItem;
 }
 
@@ -122,7 +115,7 @@ QVariantList VRetargetSetupScene::PointedAt() const
 	const auto pData = m_pRetargetSetup->TargetValues().m_pApplicationData;
 	QVariantList things;
 	for (const ISelectionItem& rItem : SelectionManager()->PreSelection().Items())
-		if (IsOfSetup(rItem))
+		if (RetargetSetup::IsOfDocument(rItem))
 			things << QVariantMap{{"kind", rItem.m_Kind}, {"index", rItem.m_ElementIndex},
 			    {"subject",
 			        QString::fromStdString(rItem.m_Kind == NVX::ESelectionSourceSegment
@@ -165,6 +158,7 @@ void VRetargetSetupScene::OnShared()
 	SelectionManager()->PreSelection().ChangedSignal().Connect(onSelectionChanged, Dispatcher());
 	SkinCache()->ChangedSignal().Connect(WeakBind(&VRetargetSetupScene::RefreshScene), Dispatcher());
 	m_pRetargetSetup->GetChangedSignal().Connect(WeakBind(&VRetargetSetupScene::OnSetupChanged), Dispatcher());
+	m_pRetargetSetup->GetLeavingSignal().Connect(WeakBind(&VRetargetSetupScene::EndDrag));
 	PublishedSignal().Connect(WeakBind(&VRetargetSetupScene::UpdateManipulator), Dispatcher());
 	PublishedSignal().Connect(WeakBind(&VRetargetSetupScene::framePublished), Dispatcher());
 }
@@ -221,6 +215,7 @@ void VRetargetSetupScene::InitialiseGL()
 		RenderManipulator()->BeginSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorPressed));
 		RenderManipulator()->ChangedSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorMoved));
 		RenderManipulator()->CancelSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorCancelled));
+		RenderManipulator()->EndSignal().Connect(WeakBind(&VRetargetSetupScene::OnManipulatorReleased));
 	}
 	Dispatcher()->Post(
 	    [pWeak = weak_from_this()]
@@ -268,6 +263,7 @@ void VRetargetSetupScene::OnManipulatorPressed()
 {
 	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
 	m_pPressed = pSubject;
+	++m_Drag;
 	m_PressedSubject = m_pRetargetSetup->TargetSubjectIdentity();
 	if (!pSubject || std::size_t(m_ManipulatedSegment) >= pSubject->m_Segments.size())
 		return;
@@ -301,8 +297,19 @@ void VRetargetSetupScene::OnManipulatorCancelled()
 		rJoint.m_BindPose = rPressed.m_BindPose;
 		rJoint.m_Mean = rPressed.m_Mean;
 	}
-	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject));
+	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject), {RetargetSetup::Steps::c_Pose, m_Drag});
 	RefreshScene();
+}
+
+void VRetargetSetupScene::OnManipulatorReleased()
+{
+	m_pRetargetSetup->EndStep();
+}
+
+void VRetargetSetupScene::EndDrag()
+{
+	if (RenderManipulator())
+		RenderManipulator()->Release();
 }
 
 void VRetargetSetupScene::ComputeJointFrame(
@@ -367,6 +374,6 @@ void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
 		    ComputeJointFrame(frame, *target.m_pSubject, i_SegmentIndex);
 		    return frame;
 	    });
-	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject));
+	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject), {RetargetSetup::Steps::c_Pose, m_Drag});
 	RefreshScene();
 }

@@ -104,6 +104,9 @@ private:
 	void OnManipulatorPressed();
 	/// The pose is what it was at the press.
 	void OnManipulatorCancelled();
+	void OnManipulatorReleased();
+	/// As if the mouse had let go.
+	void EndDrag();
 	/// With joint symmetry, what moves with a segment; it takes over the change of a pose rather than the pose where
 	/// the host's rules want it and the two are no mirror images of each other at rest, which is told once for a
 	/// character.
@@ -134,6 +137,8 @@ private:
 	/// At the last press, and the number of its subject.
 	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pPressed;
 	std::uint64_t m_PressedSubject = 0;
+	/// The drags so far, by which the edits of one are told from those of the next.
+	std::uint64_t m_Drag = 0;
 	/// -1 while the manipulator is hidden.
 	std::int64_t m_ManipulatedSegment = -1;
 	std::optional<VMirrorRule> m_MirrorRule;

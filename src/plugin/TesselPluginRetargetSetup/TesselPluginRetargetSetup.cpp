@@ -35,6 +35,8 @@ bool VTesselPluginRetargetSetup::CreateContent(
 	const auto pRetargetSetup = std::make_shared<VRetargetSetup>(
 	    i_rContext.GetDispatcher(), i_rContext.GetFrameFactory(), i_rContext.GetItemFactory());
 	pRetargetSetup->SetHostRules(TesselPluginInterface::HostRulesOf(i_rContext.GetApplicationObject()));
+	if (pRetargetSetup->HostRules().m_bKeepsHistory)
+		pRetargetSetup->KeepHistory(i_rContext.GetSelectionManager());
 	const auto pSelection =
 	    NVX::MakeShared<VRetargetSetupSelection>(i_rContext.GetDispatcher(), i_rContext.GetSelectionManager());
 	const bool bSceneFlag = i_rContext.GetSceneFlag();

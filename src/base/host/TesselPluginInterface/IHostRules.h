@@ -25,6 +25,8 @@ struct VHostRules
 	/// A segment whose name differs from its partner's in more than the rule for names knows finds it by words for
 	/// sides anywhere in the names, or by its place.
 	bool m_bPartnersBySides = false;
+	/// What edits replace is kept, since the host offers to undo them. Asked when the module makes its panel.
+	bool m_bKeepsHistory = false;
 	/// The wheel of the mouse goes nearer and farther in the fixed views of the preview, too.
 	bool m_bWheelInFixedViews = false;
 };

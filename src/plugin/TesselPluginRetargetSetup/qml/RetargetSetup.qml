@@ -160,6 +160,9 @@ Rectangle {
 		function onTargetSubjectCreated() {
 			retargetSetup.currentTargetSubjectURL = null
 		}
+		function onTargetSubjectBroughtBack(url) {
+			retargetSetup.currentTargetSubjectURL = url.toString() === "" ? null : url
+		}
 		function onCommandIgnored(command, reason) {
 			status.told = reason
 		}

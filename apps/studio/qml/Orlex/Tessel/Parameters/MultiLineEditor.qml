@@ -12,6 +12,9 @@ Item {
 
 	function restore() {
 		edited = false
+		// As in a field of one line.
+		if (field.area.canUndo)
+			field.text = ""
 		field.text = Qt.binding(() => editor.valueText)
 	}
 	function commit() {

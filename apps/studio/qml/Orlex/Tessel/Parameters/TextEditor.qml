@@ -18,6 +18,9 @@ Item {
 
 	function restore() {
 		edited = false
+		// Ctrl+Z undoes what is being typed, and no longer what was taken.
+		if (field.canUndo)
+			field.text = ""
 		field.text = Qt.binding(() => field.activeFocus ? valueText : shortText)
 		showEnd()
 	}
