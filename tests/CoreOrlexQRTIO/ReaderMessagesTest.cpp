@@ -320,5 +320,18 @@ TEST_P(ReaderMessage, IsTold)
 	EXPECT_EQ(content.m_bRead, GetParam().m_Errors.empty());
 }
 
+TEST(Reader, WhatOwnFilesHaveIsADetailWhereThatIsWanted)
+{
+	for (const auto& [pMarkers, rWarnings] : {std::pair{"<Marker NAME='Root'/>", c_None},
+	         {"<Marker NAME='Root'/><Marker NAME='Root'/>", VTexts{"File contains duplicate ID : Root "}}})
+	{
+		VContent content;
+		const std::string text = Document({{"attributes", "VERSION='3.5' xmlns:xsi='u'"}, {"Markers", pMarkers}});
+		EXPECT_TRUE(VReader(true).ReadText(text, "s", c_TestId, content.m_Subject, content.m_ApplicationData,
+		    content.m_Extras, content.m_Errors, content.m_Warnings));
+		EXPECT_EQ(content.m_Warnings, rWarnings) << pMarkers;
+	}
+}
+
 } // namespace
 } // namespace CoreOrlexQRTIO

@@ -67,7 +67,7 @@ VSession::VSession()
           NVX::CountedPointer<TesselPluginInterface::IFrameFactory>(new InMemoryHost::VFrameFactory),
           NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)))
 {
-	m_pApplication->m_Rules.m_bNamespacesAreDetails = true;
+	m_pApplication->m_Rules.m_bOwnFormsAreDetails = true;
 	m_pDocument->SetHostRules(m_pApplication);
 }
 

@@ -32,7 +32,7 @@ bool TryReadSubjectFile(const std::string& i_rPath, VSubjectFile& o_rFile)
 		o_rFile.m_Extras = session.Document().GetTargetExtras();
 		return true;
 	}
-	CoreOrlexQRTIO::VReader reader(/*i_bNamespacesAreDetails*/ true);
+	CoreOrlexQRTIO::VReader reader(/*i_bOwnFormsAreDetails*/ true);
 	return reader.Read(InputPath(i_rPath, CoreOrlexQRTIO::c_MaximumFileSize), RetargetSetup::c_SubjectName,
 	    RetargetSetup::c_SubjectId, o_rFile.m_Record.m_SubjectParametrised, o_rFile.m_Record.m_SubjectApplicationData,
 	    o_rFile.m_Extras);

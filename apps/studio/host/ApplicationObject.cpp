@@ -13,7 +13,7 @@ VApplicationObject::VApplicationObject(std::shared_ptr<const VPreferences> i_pPr
 TesselPluginInterface::VHostRules VApplicationObject::Rules() const
 {
 	TesselPluginInterface::VHostRules rules;
-	rules.m_bNamespacesAreDetails = true;
+	rules.m_bOwnFormsAreDetails = true;
 	rules.m_bEachPairOnce = true;
 	rules.m_bPartnersBySides = true;
 	rules.m_bPoseFromFile = m_pPreferences->Number(c_pPoseFromFileKey, 1) != 0;

@@ -22,14 +22,14 @@ namespace
 {
 
 /// Walks the document's elements.
-void ReadTree(UtilsRapidXml::VDocument& i_rDocument, bool i_bNamespacesAreDetails, VReading& io_rReading,
+void ReadTree(UtilsRapidXml::VDocument& i_rDocument, bool i_bOwnFormsAreDetails, VReading& io_rReading,
     VTexts& o_rErrors, VTexts& o_rWarnings)
 {
 	std::shared_ptr<UtilsRapidXml::VReaderNode::VGlobalInfo> pGlobal;
 	{
 		UtilsRapidXml::VReaderNode root(i_rDocument, false);
 		pGlobal = root.GetGlobalInfo();
-		pGlobal->m_bNamespacesAreDetails = i_bNamespacesAreDetails;
+		pGlobal->m_bOwnFormsAreDetails = i_bOwnFormsAreDetails;
 		FormatDocument(root, io_rReading);
 	}
 	o_rErrors = pGlobal->m_Errors.GetTexts();
@@ -66,7 +66,7 @@ bool VReader::ReadText(std::string i_Text, const std::string& i_rSubjectName, st
 		o_rWarnings.push_back(reason);
 		return false;
 	}
-	ReadTree(document, m_bNamespacesAreDetails, reading, o_rErrors, o_rWarnings);
+	ReadTree(document, m_bOwnFormsAreDetails, reading, o_rErrors, o_rWarnings);
 
 	CoreOrlexTypesUtils::VDynamicExpressionParserSimple parser;
 	if (!CheckExpressions(parser, reading, o_rErrors, o_rWarnings))

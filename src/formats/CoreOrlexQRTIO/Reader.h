@@ -19,9 +19,10 @@ inline constexpr std::uint32_t c_HashedIds = 0xFFFFFFFFu;
 class VReader
 {
 public:
-	/// @param i_bNamespacesAreDetails what is told of the attributes xmlns:* and xsi:*, which every written file has
-	/// and the format does not declare, is no warning but goes to the log as a detail.
-	explicit VReader(bool i_bNamespacesAreDetails = false) : m_bNamespacesAreDetails(i_bNamespacesAreDetails) {}
+	/// @param i_bOwnFormsAreDetails what is told of the attributes xmlns:* and xsi:*, which every written file has
+	/// and the format does not declare, is no warning but goes to the log as a detail; so is a name that a marker and a
+	/// segment share, as they do where performer and character name a segment alike.
+	explicit VReader(bool i_bOwnFormsAreDetails = false) : m_bOwnFormsAreDetails(i_bOwnFormsAreDetails) {}
 
 	/// Warnings and errors go to the log category "QRTIO". On false the outputs are empty or partly filled.
 	/// @param i_SubjectId c_HashedIds makes the ids of subject, markers and rotations hashes of their names; with any
@@ -47,7 +48,7 @@ public:
 	bool WriteSchema(const boost::filesystem::path& i_rPath);
 
 private:
-	bool m_bNamespacesAreDetails;
+	bool m_bOwnFormsAreDetails;
 };
 
 } // namespace CoreOrlexQRTIO

@@ -89,7 +89,7 @@ VReaderNode::~VReaderNode()
 		if (next != rRecognised.end() && *next == pAttribute->name())
 			++next;
 		else if (std::find(rRecognised.begin(), rRecognised.end(), pAttribute->name()) == rRecognised.end())
-			(m_pGlobal->m_bNamespacesAreDetails && IsOfNamespaces(UtilsRapidXml::Name(pAttribute))
+			(m_pGlobal->m_bOwnFormsAreDetails && IsOfNamespaces(UtilsRapidXml::Name(pAttribute))
 			        ? m_pGlobal->m_Details
 			        : m_pGlobal->m_Warnings)
 			    .Add("Ignoring unrecognised attribute: %1%",
@@ -230,8 +230,14 @@ bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string_view& o_
 	o_rText = {pAttribute->value(), pAttribute->value_size()};
 	if (i_SchemaType == "xsd:ID")
 	{
-		if (!m_pGlobal->m_Ids.insert(o_rText).second)
-			m_pGlobal->m_Warnings.Add("File contains duplicate ID : %1% ", o_rText);
+		const std::string_view element = UtilsRapidXml::Name(m_pElement);
+		const auto [it, bNew] = m_pGlobal->m_Ids.emplace(o_rText, element);
+		if (!bNew)
+		{
+			const bool bOtherKind = std::exchange(it->second, element) != element;
+			(m_pGlobal->m_bOwnFormsAreDetails && bOtherKind ? m_pGlobal->m_Details : m_pGlobal->m_Warnings)
+			    .Add("File contains duplicate ID : %1% ", o_rText);
+		}
 	}
 	else if (i_SchemaType == "xsd:IDREF" && !m_pGlobal->m_Ids.contains(o_rText))
 		m_pGlobal->m_Warnings.Add("File contains unknown IDREF : %1% ", o_rText);

@@ -7,7 +7,7 @@
 #include <memory>
 #include <string>
 #include <string_view>
-#include <unordered_set>
+#include <unordered_map>
 #include <vector>
 
 namespace UtilsRapidXml
@@ -51,12 +51,14 @@ public:
 		VVersion m_Version;
 		VMessages m_Errors;
 		VMessages m_Warnings;
-		/// Takes the place of m_Warnings for attributes that belong to XML itself, if that is wanted.
+		/// Takes the place of m_Warnings, if that is wanted, for attributes that belong to XML itself and for an ID
+		/// that elements of two kinds share, each of which is looked up among its own kind.
 		VMessages m_Details;
-		bool m_bNamespacesAreDetails = false;
+		bool m_bOwnFormsAreDetails = false;
 		bool m_bStrictOrder = false;
-		/// The values of all xsd:ID attributes read so far; they point into the document.
-		std::unordered_set<std::string_view> m_Ids;
+		/// The values of all xsd:ID attributes read so far, with the names of the elements that had them last; both
+		/// point into the document.
+		std::unordered_map<std::string_view, std::string_view> m_Ids;
 		std::vector<std::unique_ptr<VNotes>> m_SpareNotes;
 	};
 

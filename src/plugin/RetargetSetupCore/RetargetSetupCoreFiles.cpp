@@ -251,7 +251,7 @@ bool VRetargetSetupCore::LoadSourceSubject(const boost::filesystem::path& i_rPat
 	VSubjectParametrised subject;
 	VSubjectApplicationData applicationData;
 	CoreOrlexQRTIO::VSubjectQRTExtras extras;
-	if (!CoreOrlexQRTIO::VReader(HostRules().m_bNamespacesAreDetails)
+	if (!CoreOrlexQRTIO::VReader(HostRules().m_bOwnFormsAreDetails)
 	         .Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId, subject, applicationData, extras))
 		return false;
 	applicationData.m_Skin = i_rSkinName;
@@ -282,7 +282,7 @@ std::uint32_t VRetargetSetupCore::LoadTargetSubject(const boost::filesystem::pat
 		if (const std::uint32_t status = RetargetSetup::ReadLegacyFile(i_rPath, record))
 			return status;
 	}
-	else if (!CoreOrlexQRTIO::VReader(HostRules().m_bNamespacesAreDetails)
+	else if (!CoreOrlexQRTIO::VReader(HostRules().m_bOwnFormsAreDetails)
 	              .Read(i_rPath, RetargetSetup::c_SubjectName, RetargetSetup::c_SubjectId, rSubject, rApplicationData,
 	                  extras))
 		return NVX::Status::c_Failure;

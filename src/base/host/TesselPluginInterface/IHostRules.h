@@ -17,9 +17,10 @@ struct VHostRules
 	/// With joint symmetry a pose whose two sides' frames are no mirror images of each other mirrors its change, not
 	/// itself.
 	bool m_bMirrorChange = false;
-	/// The attributes xmlns:* and xsi:* of a skeleton file, which every file that was written here has, are told as
-	/// details, not as warnings.
-	bool m_bNamespacesAreDetails = false;
+	/// What files that were written here have and what harms nothing is told as details, not as warnings: the
+	/// attributes xmlns:* and xsi:*, and a name that a marker and a segment share, since performer and character name a
+	/// segment alike.
+	bool m_bOwnFormsAreDetails = false;
 	/// A pair of segments that has a target of a kind gets no second one of that kind.
 	bool m_bEachPairOnce = false;
 	/// A segment whose name differs from its partner's in more than the rule for names knows finds it by words for
