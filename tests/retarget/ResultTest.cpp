@@ -109,6 +109,7 @@ TEST(Take, ShowsWhatTheFileHolds)
 	    {"json", {"take", file, "--json", "--unit", "inch"}, 0,
 	        "{\n \"frames\": 61,\n \"rate\": 120.0,\n \"channels\": 72,\n \"up\": \"y\",\n \"unit\": 25.4,", ""},
 	    {"axes", {"take", file, "--json", "--up", "z", "--unit", "2"}, 0, "\"rest\": [0.0, 20.9447, -0.000778]", ""},
+	    {"demo", {"take", RETARGET_SOURCE "/demo/walk.bvh"}, 0, "387 frames at 30 Hz (12.90 s), 25 joints", ""},
 	    {"no unit", {"take", file, "--unit", "yard"}, 2, "", "\"yard\" is none of mm, cm, m, inch, and no number of"},
 	    {"no axis", {"take", file, "--up", "x"}, 2, "", "x not in {y,z}"},
 	    {"no rate", {"take", file, "--rate", "0"}, 2, "", "\"0\" is no number from 0.001 to 100000"},
