@@ -206,6 +206,17 @@ TEST_F(Edit, WhatSurprisesIsTold)
 	EXPECT_EQ(m_Folder.Run({"dump", "x.qrr"}).m_Err, "") << "of what was written here";
 	EXPECT_EQ(m_Folder.Run({"edit", "x.qrr", "-o", "y.qrr"}).m_Err, "");
 
+	Create({"--position", "Hips:Hips"});
+	const std::string scale = "<Parameter NAME=\"GlobalScale\" ";
+	const std::string path = (m_Folder / "x.qrr").string();
+	m_Folder.Write("x.qrr", Replaced(path, scale, "<Parameter NAME=\"Age\" VALUE=\"1\"/>" + scale));
+	m_Folder.Write("x.qrr", Replaced(path, "\" POSITION=\"0.000000*GlobalScale", "\" POSITION=\"Age"));
+	RunRows(
+	    {{"a scale that would lose a parameter", {"edit", "x.qrr", "--scale", "2", "-o", "z.qrr"}, 2, "",
+	        "error retarget: --scale: the scale stays: another one takes the place of the dynamic parameters 'Age', "
+	        "which the target subject needs\n"}},
+	    m_Folder);
+
 	const VRun other = m_Folder.Run({"edit", "x.qrr", "--source", Data("../../demo/performer.qrs"), "-o", "y.qrr"});
 	EXPECT_EQ(other.m_Err.find("made for the source"), std::string::npos) << "of the same name";
 	m_Folder.Write("other.qrs", Get(c_Performer));

@@ -11,6 +11,7 @@
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
+#include "RetargetSetupCore/GlobalScale.h"
 #include "RetargetSetupCore/Partner.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/RootHeight.h"
@@ -186,7 +187,9 @@ void SetScale(VSession& io_rSession, const std::string& i_rValue)
 		throw VCommandError(EWrongUsage, "--scale: a scale must be above 0: " + i_rValue);
 	io_rSession.Document().SetTargetScale(scale);
 	if (io_rSession.Document().GetTargetScale() != scale)
-		throw VCommandError(EWrongUsage, "--scale: the target subject takes no other scale");
+		throw VCommandError(EWrongUsage,
+		    "--scale: the scale stays: another one takes the place of the dynamic parameters '"
+		        + RetargetSetup::LostParameters(io_rSession.Target()) + "', which the target subject needs");
 }
 
 void CreateJoints(VSession& io_rSession, const std::string&)
