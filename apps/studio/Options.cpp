@@ -25,7 +25,7 @@ constexpr const char* c_pExamples =
     "\n"
     "Messages go to the log list of the window and to standard error as \"level category: text\".\n"
     "Exit status: 0 fine; 2 wrong usage; 3 no display, module or file that can be read, with --screenshot; 4 a picture "
-    "that cannot\nbe written.";
+    "that cannot be written.";
 
 constexpr QSize c_ScreenshotSize(1280, 800);
 /// Pictures beyond this are not drawn by the common OpenGL implementations.

@@ -117,6 +117,11 @@ void VLogPanel::Copy() const
 	QApplication::clipboard()->setText(TextToCopy());
 }
 
+int VLogPanel::HeightMissingTo(int i_Messages) const
+{
+	return i_Messages * m_pTable->verticalHeader()->defaultSectionSize() - m_pTable->viewport()->height();
+}
+
 void VLogPanel::UpdateCategories()
 {
 	const QString chosen = m_pCategories->currentIndex() > 0 ? m_pCategories->currentText() : QString();

@@ -26,6 +26,9 @@ public:
 	/// Puts TextToCopy on the clipboard.
 	void Copy() const;
 
+	/// By how many pixels the panel is too low to show so many messages at once; below 0 if it is higher.
+	int HeightMissingTo(int i_Messages) const;
+
 signals:
 	/// The operator looks at this message, as a whole.
 	void messageClicked(const QString& i_rText);

@@ -34,8 +34,8 @@ namespace
 
 /// Raised when docks change so that an old layout does not fit them.
 constexpr int c_LayoutVersion = 1;
-/// In pixels; a few messages.
-constexpr int c_LogHeight = 180;
+/// So many messages are seen before anybody has moved the log.
+constexpr int c_LogLines = 4;
 const QString c_Title = QStringLiteral("Retarget Studio");
 const QString c_GeometryKey = QStringLiteral("Window/Geometry");
 const QString c_StateKey = QStringLiteral("Window/State");
@@ -216,7 +216,12 @@ void VStudioWindow::showEvent(QShowEvent* i_pEvent)
 		m_pRetargetPanel->FocusFirstField();
 	// The layout has its size only now.
 	if (!std::exchange(m_bArranged, true))
-		QTimer::singleShot(0, this, [this] { resizeDocks({m_pLogDock}, {c_LogHeight}, Qt::Vertical); });
+		QTimer::singleShot(0, this,
+		    [this]
+		    {
+			    const auto& rLog = *qobject_cast<const VLogPanel*>(m_pLogDock->widget());
+			    resizeDocks({m_pLogDock}, {m_pLogDock->height() + rLog.HeightMissingTo(c_LogLines)}, Qt::Vertical);
+		    });
 }
 
 void VStudioWindow::closeEvent(QCloseEvent* i_pEvent)
