@@ -59,8 +59,7 @@ bool AreMirrorImages(const VSubjectParametrised& i_rParametrised, const VSubject
 		return true;
 	const std::vector<Rotation::VPose<double>> poses = SegmentPoses(*pFK);
 	const Rotation::VVector3 turn = Rotation::AngleAxisFromRotationMatrix(WorldTurn(poses, i_rSubject, i_SegmentIndex));
-	const Rotation::VVector3 mirrored =
-	    Mirrored(Rotation::CanonicalAngleAxis(turn), MirrorNormal(poses[i_SegmentIndex].t, poses[i_MirrorIndex].t));
+	const Rotation::VVector3 mirrored = Mirrored(turn, MirrorNormal(poses[i_SegmentIndex].t, poses[i_MirrorIndex].t));
 	return AngleBetween(Rotation::RotationMatrixFromAngleAxis(mirrored), WorldTurn(poses, i_rSubject, i_MirrorIndex))
 	    < c_SameMirror;
 }

@@ -112,7 +112,8 @@ void VRetargetSetupCore::SetTargetScale(double i_Scale)
 	RetargetSetup::SetGlobalScale(subject, i_Scale);
 	if (factor != 1.0)
 		RetargetSetup::ScaleRootHeight(subject, factor);
-	RetargetSetup::TellLowestSegment(subject, RootFactor(i_Scale));
+	if (!ScaleRootHeight())
+		RetargetSetup::TellLowestSegment(subject);
 	SetTargetSubjectParametrised(std::move(subject));
 }
 

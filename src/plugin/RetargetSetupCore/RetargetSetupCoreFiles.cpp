@@ -219,7 +219,8 @@ void VRetargetSetupCore::CreateTargetSubject()
 		RetargetSetup::MatchFilePoseAndTell(subject, bones, axis, rootFactor);
 	else if (rootFactor != 1.0)
 		RetargetSetup::ScaleRootHeight(subject, rootFactor);
-	RetargetSetup::TellLowestSegment(subject, rootFactor);
+	if (!ScaleRootHeight())
+		RetargetSetup::TellLowestSegment(subject);
 	const VStep step(*this, {Steps::c_Create});
 	if (!SetTargetSubject(std::move(subject), std::move(applicationData)))
 		return CommandIgnored(c_Command, Ignored::c_HostRefused);

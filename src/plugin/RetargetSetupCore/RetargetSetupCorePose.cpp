@@ -72,7 +72,8 @@ void VRetargetSetupCore::SetScaleRootHeight(bool i_bScale)
 		return;
 	VSubjectParametrised subject = *pTarget;
 	RetargetSetup::ScaleRootHeight(subject, RootFactor(scale) / before);
-	RetargetSetup::TellLowestSegment(subject, RootFactor(scale));
+	if (!i_bScale)
+		RetargetSetup::TellLowestSegment(subject);
 	SetTargetSubjectParametrised(std::move(subject));
 }
 

@@ -80,14 +80,13 @@ std::optional<VLowestSegment> FindLowestSegment(const VSubjectParametrised& i_rS
 	return VLowestSegment{std::size_t(lowest - poses.begin()), lowest->t[2]};
 }
 
-void TellLowestSegment(const VSubjectParametrised& i_rSubject, double i_RootFactor)
+void TellLowestSegment(const VSubjectParametrised& i_rSubject)
 {
 	const double scale = GetGlobalScale(i_rSubject);
-	if (scale == i_RootFactor)
+	if (scale == 1.0)
 		return;
 	VSubjectParametrised atFileSize = i_rSubject;
 	SetGlobalScale(atFileSize, 1.0);
-	ScaleRootHeight(atFileSize, 1.0 / i_RootFactor);
 	const auto before = FindLowestSegment(atFileSize);
 	const auto now = before ? FindLowestSegment(i_rSubject) : std::nullopt;
 	if (!now || std::abs(now->m_Height - scale * before->m_Height) < c_SameHeight)

@@ -32,8 +32,7 @@ struct VLowestSegment
 std::optional<VLowestSegment> FindLowestSegment(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
 
 /// Warns of a subject that hangs above the floor or sinks below it since the root's height does not fit the scale: its
-/// lowest segment is not where it is at scale 1, multiplied by the scale.
-/// @param i_RootFactor what the root's height has been multiplied by.
-void TellLowestSegment(const CoreOrlexTypes::VSubjectParametrised& i_rSubject, double i_RootFactor);
+/// lowest segment is not where it is at scale 1, multiplied by the scale. For a root whose height is not scaled.
+void TellLowestSegment(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
 
 } // namespace RetargetSetup

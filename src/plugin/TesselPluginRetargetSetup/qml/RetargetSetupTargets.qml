@@ -24,8 +24,6 @@ ColumnLayout {
 			: "Select one segment in each list on the right, or in the view, where a click with "
 			+ "Shift or Ctrl adds to what is selected. Then add a target."
 		Layout.fillHeight: true
-		// Five rows under their header.
-		Layout.minimumHeight: 6 * Theme.itemHeight
 	}
 
 	OrlexButton {

@@ -58,6 +58,7 @@ FocusScope {
 	}
 
 	implicitWidth: 300
+	// Five rows under their header.
 	implicitHeight: 6 * Theme.itemHeight
 	activeFocusOnTab: true
 	Accessible.role: Accessible.Table
