@@ -52,6 +52,7 @@ protected:
 
 TEST_F(Schema, IsASchemaAndTakesWhatIsWritten)
 {
+	EXPECT_EQ(Validate(Get(RETARGET_SOURCE "/demo/performer.qrs")), std::vector<std::string>());
 	EXPECT_EQ(Validate(WriteText(ReadText(DataText("performer.qrs")))), std::vector<std::string>());
 	EXPECT_EQ(Validate(WriteText(ReadText(DataText("version-1.0.qrs")), 0)), std::vector<std::string>());
 }

@@ -157,6 +157,12 @@ TEST_P(Material, PicturesInTheFileComeFirst)
 	         {"lambert", {}, "C:\\a.png", "", picture, true}, {"lambert", {}, "C:\\a.png", "", {}}}))
 		EXPECT_EQ(rPart.m_pTexture ? rPart.m_pTexture->m_Width : 0, 5);
 	EXPECT_TRUE(m_Failed.Take().empty());
+	// The texture's own, which is called otherwise; before version 7 the first texture is that of all materials.
+	const VTestMaterial own{"lambert", {}, "C:\a.png", "b.png", picture, true};
+	const VTestMaterial empty{"lambert", {}, "C:\a.png", "", {}, true};
+	const VMeshPart last = Read(GetParam().m_Version < 7000 ? std::vector{own} : std::vector{empty, own}).back();
+	EXPECT_EQ(last.m_pTexture ? last.m_pTexture->m_Width : 0, 5);
+	m_Failed.Take();
 	// One that is no picture: that beside the file.
 	const std::vector<VMeshPart> broken = Read({{"lambert", {}, "skin.png", "", "no picture"}});
 	ASSERT_NE(broken.at(0).m_pTexture, nullptr);

@@ -114,8 +114,10 @@ void AddMaterials(const VTestForm& i_rForm, const VTestValue& i_rNode, VObjects&
 			    {VRaw{i_rForm.m_Form == EForm::Binary
 			            ? Bytes('R', std::uint32_t(rMaterial.m_Content.size()), rMaterial.m_Content)
 			            : '"' + text.substr(0, 8) + "\",\n\"" + text.substr(8) + '"'}});
-			io_rObjects.Connect(io_rObjects.Add("Video", "video" + name, "Clip",
-			                        {Record("Filename", {rMaterial.m_FileName}), std::move(content)}),
+			const std::string& rName =
+			    rMaterial.m_RelativeName.empty() ? rMaterial.m_FileName : rMaterial.m_RelativeName;
+			io_rObjects.Connect(
+			    io_rObjects.Add("Video", "video" + name, "Clip", {Record("Filename", {rName}), std::move(content)}),
 			    texture);
 		}
 		if (rMaterial.m_bSecondVideo)

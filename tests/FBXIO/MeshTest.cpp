@@ -324,21 +324,31 @@ TEST_P(Mesh, TopMeshIsTheLastThatHasNoneAbove)
 TEST_P(Mesh, GeometricTransformsAreTold)
 {
 	VTestScene scene = OneMesh();
-	scene.m_Nodes[0].m_Properties = {
-	    {"Lcl Scaling", {2, 2, 2}}, {"GeometricTranslation", {0, 0, 3}}, {"GeometricRotation", {0, 0, 90}}};
-	const std::string file = Write(GetParam(), scene, {{0, c_Square, c_Quad, {}, {}, c_OneMaterial, {}, {}}});
-	FBXReader reader;
-	ASSERT_TRUE(reader.LoadMemory(file, "PATH"));
-	for (const char* pMessage : {"3 1 meshes of PATH are drawn without their geometric transform, which would move "
-	                             "them by up to 100.0 mm. Apply it in the program that wrote the file",
-	         ""})
+	const std::vector<std::pair<std::string, VNumbers>> rows[]{
+	    {{"Lcl Scaling", {2, 2, 2}}, {"GeometricTranslation", {0, 0, 3}}, {"GeometricRotation", {0, 0, 90}}},
+	    {{"GeometricTranslation", {0, 0, 0.009}}}};
+	for (const auto& rRow : rows)
 	{
-		std::vector<VPlacedMesh> placed;
-		reader.ReadPlacedMeshes(placed);
-		ASSERT_EQ(placed.size(), 1u);
-		EXPECT_EQ(placed[0].m_Mesh.m_Vertices.at(2).m_Position, (std::array<float, 3>{20, 20, 0}));
-		// Twice as large: the far corner goes from (40, 40, 0) to (-40, 40, 60).
-		EXPECT_EQ(Told(m_Log), *pMessage ? VMessages{pMessage} : VMessages());
+		scene.m_Nodes[0].m_Properties = rRow;
+		const VTestLayer beyond{"ByPolygon", "IndexToDirect", {}, {7}};
+		const std::string file = Write(GetParam(), scene,
+		    {{0, c_Square, c_Quad, {}, {}, beyond, std::vector<VTestMaterial>(2, {"lambert", {}, "", ""}), {}}});
+		FBXReader reader;
+		ASSERT_TRUE(reader.LoadMemory(file, "PATH"));
+		VMessages messages{"3 1 polygons of PATH are left out because their material is beyond the list of their node"};
+		if (&rRow == rows)
+			messages.push_back(
+			    "3 1 meshes of PATH are drawn without their geometric transform, which would move them by up to 100.0 "
+			    "mm. Apply it in the program that wrote the file");
+		for (const bool bFirst : {true, false})
+		{
+			std::vector<VPlacedMesh> placed;
+			reader.ReadPlacedMeshes(placed);
+			ASSERT_EQ(placed.size(), 1u);
+			EXPECT_EQ(placed[0].m_Mesh.m_Vertices.at(2).m_Position, (std::array<float, 3>{20, 20, 0}));
+			// Twice as large: the far corner goes from (40, 40, 0) to (-40, 40, 60).
+			EXPECT_EQ(Told(m_Log), bFirst ? messages : VMessages());
+		}
 	}
 }
 

@@ -4,10 +4,13 @@
 
 #include "OrlexGraphics/item/SceneFramebufferObject.h"
 #include "RetargetSetupCore/Identity.h"
+#include "TesselDataStore/StoredValue.h"
 
 #include <QLayout>
 #include <QQmlProperty>
 #include <QTest>
+
+#include <boost/filesystem/operations.hpp>
 
 namespace
 {
@@ -151,8 +154,14 @@ TEST_F(Panel, NothingIsCutOffAtItsLeastSize)
 	EXPECT_LE(least.height(), 400) << "room for menus, messages and a title bar in 1366x768";
 	m_pWidget->resize(least);
 	m_pWidget->show();
+	m_pWidget->activateWindow();
+	EXPECT_TRUE(QTest::qWaitForWindowActive(m_pWidget.get()));
 	Run();
+	EXPECT_TRUE(Property("leftView", "interactive").toBool());
+	EXPECT_GE(Item("targets")->height(), 6 * Item("status")->implicitHeight()) << "five rows under their header";
 	const QRectF whole = m_pWidget->rootObject()->boundingRect();
+	const auto isSeen = [&](const QQuickItem* i_pItem)
+	{ return whole.contains(i_pItem->mapRectToItem(m_pWidget->rootObject(), i_pItem->boundingRect())); };
 	for (const char* const pName : {"createTargetSubject", "load", "save", "saveAs", "createAllJoints",
 	         "removeUnnecessaryJoints", "jointSymmetry", "addPositionTarget", "addRotationTarget", "targetSymmetry",
 	         "updateTargets", "targets", "removeTarget", "targetParameters", "subjectParameters", "cameraType",
@@ -162,11 +171,17 @@ TEST_F(Panel, NothingIsCutOffAtItsLeastSize)
 		// What does not fit into the left column can be scrolled to.
 		QMetaObject::invokeMethod(
 		    Item("leftView"), "reveal", Q_ARG(QVariant, QVariant::fromValue(const_cast<QQuickItem*>(pItem))));
-		EXPECT_TRUE(whole.contains(pItem->mapRectToItem(m_pWidget->rootObject(), pItem->boundingRect()))) << pName;
+		EXPECT_TRUE(isSeen(pItem)) << pName;
 		const QByteArray type = pItem->metaObject()->className();
 		EXPECT_TRUE(
 		    !(type.startsWith("OrlexButton") || type.contains("CheckBox")) || pItem->width() >= pItem->implicitWidth())
 		    << pName;
+	}
+	// What has the keyboard is scrolled to by itself.
+	for (const char* const pName : {"SourceSkeleton", "targets", "SourceSkeleton"})
+	{
+		Item(pName)->forceActiveFocus();
+		EXPECT_TRUE(isSeen(Item(pName))) << pName;
 	}
 }
 
@@ -321,7 +336,12 @@ TEST_F(Panel, AddsAndRemovesTargetsOfTheSelection)
 	EXPECT_EQ(
 	    Target().m_Targets[1].m_Type, CoreOrlexTypes::VSubjectParametrised::VTarget::ELocalRotationToWorldRotation);
 	EXPECT_FALSE(Property("removeTarget", "enabled").toBool());
+	Select(NVX::ESelectionTarget, 0);
+	m_pWidget->grabFramebuffer();
+	const double place = Item("removeTarget")->y();
 	Select(NVX::ESelectionTarget, 1);
+	m_pWidget->grabFramebuffer();
+	EXPECT_EQ(Item("removeTarget")->y(), place) << "where the mouse is, though a rotation shows less";
 	EXPECT_TRUE(Property("removeTarget", "enabled").toBool());
 	EXPECT_TRUE(Property("targetParameters", "enabled").toBool());
 	Click("removeTarget");
@@ -335,6 +355,8 @@ TEST_F(Panel, AddsAndRemovesTargetsOfTheSelection)
 	m_Context.SelectionManager().Selection().Add({{NVX::ESelectionSourceSegment, RetargetSetup::c_SubjectId, 1, {}}});
 	Run();
 	EXPECT_FALSE(Property("addPositionTarget", "enabled").toBool()) << "two source segments are too many";
+	QTest::keyClick(m_pWidget.get(), Qt::Key_T, Qt::AltModifier);
+	EXPECT_EQ(Property("status", "told").toString(), "2 source segments are selected: select only one.");
 
 	EXPECT_TRUE(m_pDocument->JointSymmetry());
 	Click("jointSymmetry");
@@ -347,13 +369,19 @@ TEST_F(Panel, ACommandActsOnWhatIsSeen)
 {
 	OpenDemo();
 	m_Context.Folders().SetFolder("FolderSkins", RETARGET_TEST_DATA "/fbx");
-	Run();
-	EXPECT_EQ(Type("TargetFBX", "kenney_medium_b7400"), "");
+	// Nothing that was posted runs by itself from here on.
+	Click("showManipulator");
 	// Chosen just before.
+	boost::filesystem::copy_file(c_DemoSource, m_Folder / "anna.qrs");
+	Parameter("SourceSkeleton").SetValue(TesselDataStore::ToVariant((m_Folder / "anna.qrs").string()));
+	Parameter("TargetRoot").SetValue(TesselDataStore::ToVariant(std::uint32_t(1)));
+	Tap("createTargetSubject");
+	EXPECT_EQ(m_pDocument->TargetValues().m_pApplicationData->m_RetargetSourceTemplate, "anna");
+	EXPECT_EQ(Target().m_Segments.at(0).m_Name, "loin");
 	EXPECT_EQ(Parameter("TargetFBX").SetValueText("heaps_biped_zup_a7100"), "");
 	Tap("createTargetSubject");
-	Run();
 	EXPECT_EQ(m_pDocument->TargetValues().m_pApplicationData->m_Skin, "heaps_biped_zup_a7100");
+	Run();
 
 	auto& rSelection = m_Context.SelectionManager().Selection();
 	for (const std::uint32_t segment : {2u, 4u, 6u})
@@ -394,13 +422,33 @@ TEST_F(Panel, ACommandActsOnWhatIsSeen)
 	EXPECT_EQ(state(1), last);
 	for (const auto& rTarget : Target().m_Targets)
 		EXPECT_EQ(rTarget.m_StateExpressions[0].find("79"), std::string::npos) << "it went with its target";
-	emit m_pDocument->targetFound(1);
+	// Selected just before.
+	rSelection.Remove(rSelection.ItemsOfKind(NVX::ESelectionTarget));
+	rSelection.Add({{NVX::ESelectionTarget, RetargetSetup::c_SubjectId, 1, {}}});
+	Tap("removeTarget");
 	Run();
-	EXPECT_EQ(m_pSelection->SelectedTarget(), 1);
+	EXPECT_EQ(Target().m_Targets.size(), 2u);
+	EXPECT_NE(state(0), last);
+	emit m_pDocument->targetFound(0);
+	Run();
+	EXPECT_EQ(m_pSelection->SelectedTarget(), 0);
 	EXPECT_EQ(m_pSelection->SelectedTargetSegment(), 6) << "segments stay selected";
 	Click("createTargetSubject");
 	EXPECT_EQ(m_pSelection->SelectedTargetSegment(), -1) << "of the character before";
 	EXPECT_EQ(m_pSelection->SelectedSourceSegment(), 6);
+	EXPECT_EQ(Type("SourceSkeleton", "performer"), "");
+	EXPECT_EQ(m_pSelection->SelectedSourceSegment(), -1) << "of the performer before";
+
+	// A character that lies is told of until it stands.
+	EXPECT_EQ(Type("TargetFBX", "pab_arnaud_b7500"), "");
+	for (const char* const pButton : {"matchFilePose", "poseNoteMatch"})
+	{
+		EXPECT_FALSE(Property("poseNote", "visible").toBool());
+		Click("createTargetSubject");
+		EXPECT_TRUE(Property("poseNote", "visible").toBool());
+		Click(pButton);
+	}
+	EXPECT_FALSE(Property("poseNote", "visible").toBool());
 }
 
 TEST_F(Panel, ListsStayWhereTheyWereScrolledTo)

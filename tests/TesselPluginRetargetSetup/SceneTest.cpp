@@ -143,19 +143,19 @@ TEST_F(Scene, MirrorsTheChangeWhereTheHostWantsIt)
 	m_pDocument->CreateTargetSubject();
 	Run();
 	Frame();
-	const std::uint32_t arm = IndexOf("LeftForeArm"), other = IndexOf("RightForeArm");
-	const auto drag = [&]
+	const auto drag = [&](const std::string& i_rName, float i_Degrees)
 	{
+		const std::uint32_t arm = IndexOf("Left" + i_rName), other = IndexOf("Right" + i_rName);
 		SelectSegment(arm);
 		const QMatrix4x4 before = World(other);
 		QMatrix4x4 turned = World(arm);
-		turned.rotate(1, 0, 1, 0);
+		turned.rotate(i_Degrees, 0, 1, 0);
 		Manipulator().ChangedSignal().Fire(turned);
 		Run();
 		Frame();
 		return Distance(before, World(other));
 	};
-	EXPECT_GT(drag(), 0.3f) << "the pose itself is mirrored";
+	EXPECT_GT(drag("ForeArm", 1), 0.3f) << "the pose itself is mirrored";
 	const auto pApplication = std::make_shared<InMemoryHost::VApplication>();
 	pApplication->m_Rules.m_bMirrorChange = true;
 	m_pDocument->SetHostRules(pApplication);
@@ -166,7 +166,7 @@ TEST_F(Scene, MirrorsTheChangeWhereTheHostWantsIt)
 	NVX::GlobalLog::Category("RetargetSetup").SetLevel(NVX::ELogInformation);
 	for (int i = 0; i < 2; ++i)
 	{
-		EXPECT_LT(drag(), 0.02f);
+		EXPECT_LT(drag("ForeArm", 1), 0.02f);
 		EXPECT_EQ(TakeLog().find("mirrors what changes in a pose") != std::string::npos, i == 0) << "told once";
 	}
 	auto renamed = Target();
@@ -182,6 +182,11 @@ TEST_F(Scene, MirrorsTheChangeWhereTheHostWantsIt)
 		EXPECT_EQ(Target().m_Segments[other].m_Joint.m_BindPose != before, bBySides);
 	}
 	NVX::GlobalLog::Category("RetargetSetup").SetLevel(NVX::ELogWarning);
+
+	m_pDocument->SetJointSymmetry(false);
+	EXPECT_EQ(drag("Arm", 30), 0.0f);
+	m_pDocument->SetJointSymmetry(true);
+	EXPECT_GT(drag("Arm", 1), 0.3f) << "these are mirror images: it comes to the pose of the other side";
 }
 
 TEST_F(Scene, ConnectsTheManipulatorOnce)

@@ -124,6 +124,9 @@ TEST(Render, DrawsWhatThePreviewShows)
 	std::vector<std::string> piped = bottom;
 	piped[2] = "-";
 	EXPECT_EQ(folder.Run(piped, "x.qrr").m_Out, bones);
+	EXPECT_EQ(folder.Run({"-q", "create", "--fbx", Data("fbx/heaps_biped_zup_a7100.fbx"), "-o", "y.qrr"}).m_Status, 0);
+	const VRun shared = folder.Run({"render", "y.qrr", "--skins", Data("fbx"), "--size", "64x64", "-o", "-"});
+	EXPECT_EQ(shared.m_Err.find("other control points"), std::string::npos) << shared.m_Err;
 }
 
 TEST(Render, TellsWhatItLacks)

@@ -4,7 +4,10 @@
 
 #include <boost/algorithm/string/replace.hpp>
 
+#include <algorithm>
 #include <cstdlib>
+#include <sstream>
+#include <sys/wait.h>
 
 namespace
 {
@@ -75,6 +78,8 @@ TEST(Usage, OutputsThatWouldDestroy)
 	for (const char* pName : {"other.fbx", "fbx.qrr"})
 		folder.Write(pName, "Kaydara FBX Binary  ");
 	folder.Write("empty.xsd", "");
+	// A file that nobody can read from its beginning, whoever runs the test.
+	boost::filesystem::create_symlink("/proc/self/mem", folder / "closed.qrr");
 	folder.Write("COMMENTED.QRR", "\xEF\xBB\xBF<?xml version=\"1.0\"?>\n<!-- <Skeleton> -->\n<KinematicModel/>");
 	const auto before = folder.Snapshot();
 	RunRows(
@@ -99,6 +104,8 @@ TEST(Usage, OutputsThatWouldDestroy)
 	        {"misnamed, schema", {"schema", "-o", "subject.xsd"}, 4, "", "is not an XML schema"},
 	        {"misnamed, render", {"render", "hero.qrr", "-o", "subject.png"}, 4, "", "is not a PNG picture"},
 	        {"misnamed, convert", {"convert", "performer.qrs", "fbx.qrr"}, 4, "", "is not a skeleton file"},
+	        {"unreadable", {"edit", "hero.qrr", "-o", "closed.qrr"}, 4, "",
+	            "\"closed.qrr\" is there but cannot be read, so that it may be anything; --force replaces it"},
 	        {"another kind", {"convert", "performer.qrs", "hero.qrr"}, 4, "",
 	            "\"hero.qrr\" is there, and is of another kind than \"performer.qrs\""},
 	    },
@@ -201,6 +208,36 @@ TEST(Usage, WarningsAreErrorsWhereAsked)
 	    folder);
 	EXPECT_EQ(RunJson(with({"--match-file-pose", "--json"}), folder),
 	    VJson({{"output", "x.qrr"}, {"segments", 54}, {"joints", 54}, {"targets", 0}}));
+	// What only a save finds.
+	folder.Write("x.qrr", Replaced((folder / "x.qrr").string(), "OPACITY=\"255\"", "OPACITY=\"0\""));
+	folder.Write("x.qrr", Replaced((folder / "x.qrr").string(), "RGB=\"255 0 255\"", "RGB=\"0 0 0\""));
+	RunRows({{"a save", {"edit", "x.qrr", "-o", "y.qrr", "--strict"}, 1, "", "--strict: 2 warnings count as errors"}},
+	    folder);
+}
+
+TEST(Usage, FitsItsTerminal)
+{
+	if (std::system("command -v script > /dev/null") != 0)
+		GTEST_SKIP() << "script is not installed, which makes terminals";
+	const VScratchFolder folder;
+	const auto run = [&](const char* i_pTerm, const char* i_pLine)
+	{
+		const std::string out = (folder / "out").string();
+		const int status =
+		    std::system((std::string("TERM=") + i_pTerm + " script -qec \"stty cols 60; '" RETARGET_PROGRAM "' "
+		        + i_pLine + "\" /dev/null < /dev/null > '" + out + "'")
+		                    .c_str());
+		EXPECT_TRUE(WIFEXITED(status)) << i_pLine;
+		return boost::algorithm::replace_all_copy(folder.Read("out"), "\r", "");
+	};
+	std::size_t widest = 0;
+	std::istringstream help(run("xterm", "create --help"));
+	for (std::string line; std::getline(help, line);)
+		widest = std::max(widest, line.size());
+	EXPECT_EQ(widest, 60u);
+	const bool bColours = !std::getenv("NO_COLOR");
+	for (const char* const pTerm : {"xterm", "dumb"})
+		EXPECT_EQ(run(pTerm, "dump nothing").find("\033[") != std::string::npos, bColours && *pTerm == 'x') << pTerm;
 }
 
 TEST(Usage, ReasonsOfErrors)
@@ -213,6 +250,9 @@ TEST(Usage, ReasonsOfErrors)
 	EXPECT_EQ(folder.Run({"dump", "cut.qrs"}).m_Err, reason + read);
 	EXPECT_EQ(folder.Run({"dump", "cut.qrs", "-q"}).m_Err, reason + read);
 	EXPECT_EQ(folder.Run({"dump", "cut.qrs", "--log", "QRTIO=error"}).m_Err, read) << "as asked";
+	const VRun other = folder.Run({"-q", "create", "--fbx", Data("fbx/kenney_medium_b7400.fbx"), "-o", "no/x.qrr"});
+	EXPECT_EQ(other.m_Status, 4);
+	EXPECT_EQ(other.m_Err.find("root bones"), std::string::npos) << "is no reason: " << other.m_Err;
 }
 
 TEST(Usage, CompletionOffersWhatMayStandThere)

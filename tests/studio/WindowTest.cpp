@@ -5,6 +5,7 @@
 #include "TesselPluginInterface/IParameter.h"
 #include "TesselPluginInterface/IParameterGroup.h"
 #include "TesselPluginInterface/PathTypes.h"
+#include "studio/host/OpenGLCheck.h"
 #include "studio/host/Preferences.h"
 #include "studio/host/Services.h"
 #include "studio/log/LogModel.h"
@@ -18,10 +19,12 @@
 #include <QAction>
 #include <QApplication>
 #include <QComboBox>
+#include <QDialog>
 #include <QDir>
 #include <QDockWidget>
 #include <QDropEvent>
 #include <QFileDialog>
+#include <QHeaderView>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
@@ -31,6 +34,7 @@
 #include <QQuickItem>
 #include <QQuickWidget>
 #include <QQuickWindow>
+#include <QStyleHints>
 #include <QTableView>
 #include <QTest>
 #include <QTextBrowser>
@@ -101,7 +105,8 @@ protected:
 		for (const QString& rFile : i_rFiles)
 			urls << QUrl::fromLocalFile(rFile);
 		data.setUrls(urls);
-		QDragEnterEvent enter({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, {});
+		// With Shift the other side offers to move them.
+		QDragEnterEvent enter({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, Qt::ShiftModifier);
 		QApplication::sendEvent(&i_rPart, &enter);
 		if (!enter.isAccepted())
 			return false;
@@ -109,7 +114,7 @@ protected:
 		EXPECT_TRUE(pMark && pMark->isVisible());
 		m_Marked = pMark ? pMark->property("text").toString() : QString();
 		EXPECT_EQ(enter.dropAction(), Qt::CopyAction);
-		QDropEvent drop({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, {});
+		QDropEvent drop({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, Qt::ShiftModifier);
 		QApplication::sendEvent(&i_rPart, &drop);
 		EXPECT_FALSE(DropMark());
 		RunEvents();
@@ -172,6 +177,11 @@ TEST_F(Window, TakesDroppedFilesByKind)
 	ASSERT_TRUE(QFile::copy(c_Source, target));
 
 	EXPECT_FALSE(Drop({note}));
+	QDialog dialog(m_pWindow.get());
+	dialog.setModal(true);
+	dialog.show();
+	EXPECT_FALSE(Drop({c_Source})) << "a dialog is answered first";
+	dialog.hide();
 	EXPECT_TRUE(Drop({target, note, c_Fbx, c_Source}));
 	EXPECT_EQ(m_Marked,
 	    "performer.qrs opens as the performer's skeleton\ncharacter.fbx opens as the character's FBX file\n"
@@ -188,9 +198,9 @@ TEST_F(Window, TakesDroppedFilesByKind)
 	for (QWidget* pPart : {m_pWindow->RetargetPanel()->Widget(), static_cast<QWidget*>(pField)})
 	{
 		EXPECT_TRUE(Drop({c_Source}, *pPart)) << pPart->objectName().toStdString();
-		EXPECT_EQ(RecentFiles().front(), c_Source);
+		EXPECT_EQ(RecentFiles().value(0), c_Source);
 		EXPECT_TRUE(Drop({c_Fbx}, *pPart));
-		EXPECT_EQ(RecentFiles().front(), c_Fbx);
+		EXPECT_EQ(RecentFiles().value(0), c_Fbx);
 	}
 	EXPECT_EQ(pField->text(), "");
 
@@ -237,6 +247,7 @@ TEST_F(Window, ExplainsSilentCommands)
 	Action("FrameSelected").trigger();
 	Action("ScaleUpManipulator").trigger();
 	EXPECT_EQ(m_Messages.Take(), "") << "the panel knows these";
+	EXPECT_TRUE(Action("ScaleUpManipulator").shortcuts().contains(QKeySequence("Ctrl+="))) << "without Shift";
 	auto* const pPanel = dynamic_cast<NVX::IQuickWidget*>(m_pWindow->RetargetPanel()->Widget());
 	QMetaObject::invokeMethod(pPanel->contextProperty("ContextRetargetSetup").value<QObject*>(), "CreateTargetSubject");
 	RunEvents();
@@ -324,6 +335,9 @@ TEST_F(Window, KeepsItsLayout)
 	LoadPanel();
 	auto* const pLog = m_pWindow->findChild<QDockWidget*>("LogDock");
 	EXPECT_TRUE(pLog->isVisible());
+	RunEvents();
+	const auto& rTable = *m_pWindow->findChild<QTableView*>("LogTable");
+	EXPECT_EQ(rTable.viewport()->height() / rTable.verticalHeader()->defaultSectionSize(), 4) << "lines of it";
 	pLog->toggleViewAction()->trigger();
 	m_pWindow->resize(1500, 950);
 	RunEvents();
@@ -589,6 +603,13 @@ TEST_F(Window, PreferencesHaveARowForEachFolder)
 	pSkins->clear();
 	dialog.Apply();
 	EXPECT_TRUE(m_pWindow->Context().Preferences().Folder("FolderSkins").empty());
+}
+
+TEST(OpenGLCheck, NoTextCursorBlinksWhereTheProcessorDraws)
+{
+	QGuiApplication::styleHints()->setCursorFlashTime(1000);
+	EXPECT_TRUE(StudioHost::CheckOpenGL());
+	EXPECT_EQ(QGuiApplication::styleHints()->cursorFlashTime(), 0);
 }
 
 TEST_F(Window, AllControlsAreNamed)

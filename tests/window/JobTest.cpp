@@ -362,8 +362,17 @@ TEST_F(Job, ALegacyFileIsSavedUnderANewName)
 	rOperator.AnswerDialog(File("new.qrr"));
 	EXPECT_EVENTUALLY(QFile::exists(File("new.qrr")));
 	EXPECT_TRUE(Content("new.qrr") == CommandLine({"edit", File("old.qrx")}));
-	EXPECT_TRUE(Content("old.qrx") == legacy);
 	EXPECT_EVENTUALLY(rOperator.Property("currentFile", "text").toString() == "Current file: new.qrr");
+
+	rOperator.Click("load");
+	rOperator.AnswerDialog(File("old.qrx"));
+	EXPECT_EVENTUALLY(rOperator.Property("currentFile", "text").toString() == "Current file: old.qrx");
+	rOperator.Click("removeUnnecessaryJoints");
+	rOperator.AnswerNextQuestion("old.qrx has changes that are not saved.", QMessageBox::Save);
+	rOperator.AnswerNextDialog(File("closed.qrr"));
+	EXPECT_TRUE(m_pWindow->close());
+	EXPECT_TRUE(QFile::exists(File("closed.qrr")));
+	EXPECT_TRUE(Content("old.qrx") == legacy);
 }
 
 } // namespace
