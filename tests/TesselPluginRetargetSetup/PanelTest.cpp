@@ -338,6 +338,8 @@ TEST_F(Panel, AddsAndRemovesTargetsOfTheSelection)
 	EXPECT_FALSE(Property("removeTarget", "enabled").toBool());
 	Select(NVX::ESelectionTarget, 0);
 	m_pWidget->grabFramebuffer();
+	EXPECT_EQ(Property("TargetStateExpressionZUnit", "text").toString(), "mm");
+	EXPECT_TRUE(Property("TargetStateExpressionZUnit", "visible").toBool());
 	const double place = Item("removeTarget")->y();
 	Select(NVX::ESelectionTarget, 1);
 	m_pWidget->grabFramebuffer();

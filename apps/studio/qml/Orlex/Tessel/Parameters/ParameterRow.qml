@@ -136,6 +136,7 @@ Item {
 	}
 	OrlexLabel {
 		id: unitLabel
+		objectName: row.name + "Unit"
 		visible: row.unit !== ""
 		anchors.right: resetter.visible ? resetter.left : parent.right
 		height: Theme.controlHeight
