@@ -249,6 +249,16 @@ TEST_F(FolderWatcher, FollowsAWayThatAppearsStepByStep)
 		return Names(*pParameter) == VTexts{"first", "second"};
 	};
 	EXPECT_TRUE(QTest::qWaitFor(becomes, 30000));
+
+	// A notice that comes before that clock has gone on.
+	constexpr std::time_t c_Time = 1000000000;
+	last_write_time(m_Folder / "u", c_Time);
+	pParameter->Refresh();
+	Put(m_Folder / "u/third.qrs", "");
+	last_write_time(m_Folder / "u", c_Time);
+	Notice(*pParameter, m_Folder / "u");
+	m_Delay.Pass();
+	EXPECT_EQ(Names(*pParameter), (VTexts{"first", "second", "third"}));
 }
 
 TEST_F(FolderWatcher, AStoredValueIsHeldAgainstTheFilesOnce)

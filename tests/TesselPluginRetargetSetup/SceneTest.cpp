@@ -143,19 +143,20 @@ TEST_F(Scene, MirrorsTheChangeWhereTheHostWantsIt)
 	m_pDocument->CreateTargetSubject();
 	Run();
 	Frame();
-	const auto drag = [&](const std::string& i_rName, float i_Degrees)
+	const std::uint32_t arm = IndexOf("LeftForeArm"), other = IndexOf("RightForeArm");
+	const std::uint32_t upper = IndexOf("LeftArm"), otherUpper = IndexOf("RightArm");
+	const auto drag = [&](std::uint32_t i_Segment, std::uint32_t i_Other, float i_Degrees)
 	{
-		const std::uint32_t arm = IndexOf("Left" + i_rName), other = IndexOf("Right" + i_rName);
-		SelectSegment(arm);
-		const QMatrix4x4 before = World(other);
-		QMatrix4x4 turned = World(arm);
+		SelectSegment(i_Segment);
+		const QMatrix4x4 before = World(i_Other);
+		QMatrix4x4 turned = World(i_Segment);
 		turned.rotate(i_Degrees, 0, 1, 0);
 		Manipulator().ChangedSignal().Fire(turned);
 		Run();
 		Frame();
-		return Distance(before, World(other));
+		return Distance(before, World(i_Other));
 	};
-	EXPECT_GT(drag("ForeArm", 1), 0.3f) << "the pose itself is mirrored";
+	EXPECT_GT(drag(arm, other, 1), 0.3f) << "the pose itself is mirrored";
 	const auto pApplication = std::make_shared<InMemoryHost::VApplication>();
 	pApplication->m_Rules.m_bMirrorChange = true;
 	m_pDocument->SetHostRules(pApplication);
@@ -166,9 +167,14 @@ TEST_F(Scene, MirrorsTheChangeWhereTheHostWantsIt)
 	NVX::GlobalLog::Category("RetargetSetup").SetLevel(NVX::ELogInformation);
 	for (int i = 0; i < 2; ++i)
 	{
-		EXPECT_LT(drag("ForeArm", 1), 0.02f);
+		EXPECT_LT(drag(arm, other, 1), 0.02f);
 		EXPECT_EQ(TakeLog().find("mirrors what changes in a pose") != std::string::npos, i == 0) << "told once";
 	}
+	m_pDocument->SetJointSymmetry(false);
+	EXPECT_EQ(drag(upper, otherUpper, 30), 0.0f);
+	m_pDocument->SetJointSymmetry(true);
+	EXPECT_GT(drag(upper, otherUpper, 1), 0.3f) << "these are mirror images: it comes to the pose of the other side";
+
 	auto renamed = Target();
 	renamed.m_Segments[arm].m_Name = "bras gauche";
 	renamed.m_Segments[other].m_Name = "bras droit";
@@ -178,15 +184,10 @@ TEST_F(Scene, MirrorsTheChangeWhereTheHostWantsIt)
 		pApplication->m_Rules.m_bPartnersBySides = bBySides;
 		SelectSegment(arm);
 		const std::vector<double> before = Target().m_Segments[other].m_Joint.m_BindPose;
-		drag();
+		drag(arm, other, 1);
 		EXPECT_EQ(Target().m_Segments[other].m_Joint.m_BindPose != before, bBySides);
 	}
 	NVX::GlobalLog::Category("RetargetSetup").SetLevel(NVX::ELogWarning);
-
-	m_pDocument->SetJointSymmetry(false);
-	EXPECT_EQ(drag("Arm", 30), 0.0f);
-	m_pDocument->SetJointSymmetry(true);
-	EXPECT_GT(drag("Arm", 1), 0.3f) << "these are mirror images: it comes to the pose of the other side";
 }
 
 TEST_F(Scene, ConnectsTheManipulatorOnce)

@@ -5,7 +5,6 @@
 #include "TesselPluginInterface/IParameter.h"
 #include "TesselPluginInterface/IParameterGroup.h"
 #include "TesselPluginInterface/PathTypes.h"
-#include "studio/host/OpenGLCheck.h"
 #include "studio/host/Preferences.h"
 #include "studio/host/Services.h"
 #include "studio/log/LogModel.h"
@@ -34,7 +33,6 @@
 #include <QQuickItem>
 #include <QQuickWidget>
 #include <QQuickWindow>
-#include <QStyleHints>
 #include <QTableView>
 #include <QTest>
 #include <QTextBrowser>
@@ -603,13 +601,6 @@ TEST_F(Window, PreferencesHaveARowForEachFolder)
 	pSkins->clear();
 	dialog.Apply();
 	EXPECT_TRUE(m_pWindow->Context().Preferences().Folder("FolderSkins").empty());
-}
-
-TEST(OpenGLCheck, NoTextCursorBlinksWhereTheProcessorDraws)
-{
-	QGuiApplication::styleHints()->setCursorFlashTime(1000);
-	EXPECT_TRUE(StudioHost::CheckOpenGL());
-	EXPECT_EQ(QGuiApplication::styleHints()->cursorFlashTime(), 0);
 }
 
 TEST_F(Window, AllControlsAreNamed)

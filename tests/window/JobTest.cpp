@@ -2,10 +2,13 @@
 
 #include "WindowFixture.h"
 
+#include "studio/host/OpenGLCheck.h"
 #include "studio/host/Services.h"
 
 #include <QFile>
+#include <QGuiApplication>
 #include <QQuickItem>
+#include <QStyleHints>
 
 namespace
 {
@@ -373,6 +376,13 @@ TEST_F(Job, ALegacyFileIsSavedUnderANewName)
 	EXPECT_TRUE(m_pWindow->close());
 	EXPECT_TRUE(QFile::exists(File("closed.qrr")));
 	EXPECT_TRUE(Content("old.qrx") == legacy);
+}
+
+TEST(OpenGLCheck, NoTextCursorBlinksWhereTheProcessorDraws)
+{
+	QGuiApplication::styleHints()->setCursorFlashTime(1000);
+	EXPECT_TRUE(StudioHost::CheckOpenGL());
+	EXPECT_EQ(QGuiApplication::styleHints()->cursorFlashTime(), 0);
 }
 
 } // namespace
