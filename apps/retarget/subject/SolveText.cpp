@@ -21,6 +21,8 @@ constexpr double c_Degrees = 180.0 / std::numbers::pi;
 /// A foot may slide by this beyond the performer's, and stand so far from the floor, in mm.
 constexpr double c_FineSlide = 30.0;
 constexpr double c_FineHeight = 30.0;
+/// What the floor of a take may be off, in mm.
+constexpr double c_FineFloor = 10.0;
 /// A knee may differ so much, in radians.
 constexpr double c_FineFlexion = 16.0 / c_Degrees;
 constexpr double c_FineAxis = 20.0 / c_Degrees;
@@ -155,6 +157,12 @@ std::vector<VFinding> FindingsOf(const VSolveResult& i_rResult)
 	findings.insert(
 	    findings.end(), i_rResult.m_rSolve.Source().Findings().begin(), i_rResult.m_rSolve.Source().Findings().end());
 	findings.insert(findings.end(), i_rResult.m_rSolve.Findings().begin(), i_rResult.m_rSolve.Findings().end());
+	if (std::abs(rReport.m_Floor) > c_FineFloor)
+		findings.push_back({"take-floor",
+		    "By the take the performer's feet stand " + Fixed(std::abs(rReport.m_Floor), 0) + " mm "
+		        + (rReport.m_Floor < 0.0 ? "lower" : "higher")
+		        + " than in the bind pose, and the character's go along. See where the floor of the take is, and that "
+		          "of the performer; heights of feet are told from where the performer's stand."});
 	for (const VFootQuality& rFoot : rReport.m_Feet)
 	{
 		const std::string& rName = rSegments[rFoot.m_Target].m_Name;
@@ -238,8 +246,8 @@ VJson SolveToJson(const VSolveResult& i_rResult)
 		findings.push_back({{"id", rFinding.m_pId}, {"message", rFinding.m_Message}});
 	return {{"first", i_rResult.m_rSolved.m_First}, {"frames", i_rResult.m_rSolved.m_Frames},
 	    {"rate", i_rResult.m_rSolve.Source().Take().m_Rate}, {"scale", Rounded(i_rResult.m_rSolve.Source().Scale())},
-	    {"findings", std::move(findings)}, {"targets", std::move(targets)}, {"feet", std::move(feet)},
-	    {"bends", std::move(bends)}, {"notConverged", rReport.m_NotConverged},
+	    {"findings", std::move(findings)}, {"targets", std::move(targets)}, {"floor", Rounded(rReport.m_Floor)},
+	    {"feet", std::move(feet)}, {"bends", std::move(bends)}, {"notConverged", rReport.m_NotConverged},
 	    {"frameTime", {{"median", Rounded(rReport.m_MedianTime)}, {"p95", Rounded(rReport.m_P95Time)}}}};
 }
 

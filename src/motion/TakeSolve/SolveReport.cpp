@@ -86,33 +86,47 @@ VPart FindPart(const VProposal& i_rProposal, EBodyPart i_Part, ESide i_Side)
 class VFoot
 {
 public:
-	VFoot(const VProposedPair& i_rAnkle, const VPart& i_rToe, ESide i_Side, const VPoses& i_rTargetBind)
-	    : m_Ankle(i_rAnkle), m_Toe(i_rToe.value_or(i_rAnkle))
+	VFoot(const VProposedPair& i_rAnkle, const VPart& i_rToe, ESide i_Side, const VPoses& i_rSourceBind,
+	    const VPoses& i_rTargetBind)
+	    : m_Ankle(i_rAnkle), m_Toe(i_rToe.value_or(i_rAnkle)), m_SourceBind{i_rSourceBind[m_Ankle.m_Source].t[2],
+	                                                               i_rSourceBind[m_Toe.m_Source].t[2]},
+	      m_TargetBind{i_rTargetBind[m_Ankle.m_Target].t[2], i_rTargetBind[m_Toe.m_Target].t[2]}
 	{
 		m_Quality.m_Side = i_Side;
 		m_Quality.m_Source = i_rAnkle.m_Source;
 		m_Quality.m_Target = i_rAnkle.m_Target;
-		m_AnkleHeight = i_rTargetBind[m_Ankle.m_Target].t[2];
-		m_ToeHeight = i_rTargetBind[m_Toe.m_Target].t[2];
 	}
 
 	void Add(const VPoses& i_rSource, const VPoses& i_rTarget)
 	{
 		m_SourcePlaces.push_back(i_rSource[m_Toe.m_Source].t);
 		m_TargetPlaces.push_back(i_rTarget[m_Toe.m_Target].t);
-		m_Heights.push_back(
-		    std::min(i_rTarget[m_Ankle.m_Target].t[2] - m_AnkleHeight, i_rTarget[m_Toe.m_Target].t[2] - m_ToeHeight));
+		m_SourceHeights.push_back(std::min(i_rSource[m_Ankle.m_Source].t[2] - m_SourceBind.m_Ankle,
+		    i_rSource[m_Toe.m_Source].t[2] - m_SourceBind.m_Toe));
+		m_Heights.push_back(std::min(i_rTarget[m_Ankle.m_Target].t[2] - m_TargetBind.m_Ankle,
+		    i_rTarget[m_Toe.m_Target].t[2] - m_TargetBind.m_Toe));
 	}
 
-	VFootQuality Quality(std::size_t i_First, double i_Rate)
+	/// Finds when it stands, and adds how high the performer's does.
+	void FindStanding(double i_Rate, std::vector<double>& io_rHeights)
 	{
+		m_Stands = FindStands(m_SourcePlaces, i_Rate);
+		for (const VStand& rStand : m_Stands)
+			io_rHeights.insert(io_rHeights.end(), m_SourceHeights.begin() + std::ptrdiff_t(rStand.m_First),
+			    m_SourceHeights.begin() + std::ptrdiff_t(rStand.m_Last));
+	}
+
+	VFootQuality Quality(std::size_t i_First, double i_Floor)
+	{
+		for (double& rHeight : m_Heights)
+			rHeight -= i_Floor;
 		const auto lowest = std::ranges::min_element(m_Heights);
 		m_Quality.m_Lowest = *lowest;
 		m_Quality.m_LowestFrame = i_First + std::size_t(lowest - m_Heights.begin());
 		const auto slide = [](const std::vector<VVector3>& i_rPlaces, std::size_t i_From, std::size_t i_To)
 		{ return std::hypot(i_rPlaces[i_To][0] - i_rPlaces[i_From][0], i_rPlaces[i_To][1] - i_rPlaces[i_From][1]); };
 		bool bFirst = true;
-		for (const VStand& rStand : FindStands(m_SourcePlaces, i_Rate))
+		for (const VStand& rStand : m_Stands)
 			for (std::size_t i = rStand.m_First; i < rStand.m_Last; ++i)
 			{
 				++m_Quality.m_StandingFrames;
@@ -134,10 +148,19 @@ public:
 	}
 
 private:
+	/// In the bind pose.
+	struct VHeights
+	{
+		double m_Ankle;
+		double m_Toe;
+	};
+
 	VProposedPair m_Ankle;
 	VProposedPair m_Toe;
-	double m_AnkleHeight = 0.0;
-	double m_ToeHeight = 0.0;
+	VHeights m_SourceBind;
+	VHeights m_TargetBind;
+	std::vector<VStand> m_Stands;
+	std::vector<double> m_SourceHeights;
 	std::vector<VVector3> m_SourcePlaces;
 	std::vector<VVector3> m_TargetPlaces;
 	std::vector<double> m_Heights;
@@ -300,7 +323,7 @@ VSolveReport ReportOn(const VSubject& i_rTarget, std::span<const double> i_BindP
 	for (const ESide side : {ESide::Left, ESide::Right})
 	{
 		if (const VPart ankle = FindPart(proposal, EFoot, side))
-			feet.emplace_back(*ankle, FindPart(proposal, EToe, side), side, target);
+			feet.emplace_back(*ankle, FindPart(proposal, EToe, side), side, i_rSource.BindPoses(), target);
 		const auto addBend = [&](const char* i_pName, EBodyPart i_Upper, EBodyPart i_Middle, EBodyPart i_Lower)
 		{
 			const VPart upper = FindPart(proposal, i_Upper, side);
@@ -325,8 +348,12 @@ VSolveReport ReportOn(const VSubject& i_rTarget, std::span<const double> i_BindP
 			rBend.Add(source, target);
 		jumps.Add(i_rSolved.m_First + i, source, target);
 	}
+	std::vector<double> standing;
 	for (VFoot& rFoot : feet)
-		report.m_Feet.push_back(rFoot.Quality(i_rSolved.m_First, i_rSource.Take().m_Rate));
+		rFoot.FindStanding(i_rSource.Take().m_Rate, standing);
+	report.m_Floor = Percentile(standing, 0.5);
+	for (VFoot& rFoot : feet)
+		report.m_Feet.push_back(rFoot.Quality(i_rSolved.m_First, report.m_Floor));
 	for (const VBend& rBend : bends)
 		report.m_Bends.push_back(rBend.Quality());
 	report.m_Jumps = jumps.Largest();

@@ -23,7 +23,8 @@ struct VTargetQuality
 };
 
 /// A foot of the character while that of the performer stands: hardly moves, near to where it is lowest. Heights are of
-/// whichever of ankle and toe is lower, over its own height in the bind pose, in which feet are taken to stand.
+/// whichever of ankle and toe is lower, over its own height in the bind pose, in which feet are taken to stand, and over
+/// VSolveReport::m_Floor.
 struct VFootQuality
 {
 	SetupProposal::ESide m_Side = SetupProposal::ESide::None;
@@ -86,6 +87,9 @@ struct VSolveReport
 	/// By the subject's targets; one that is left out has no frames.
 	std::vector<VTargetQuality> m_Targets;
 	std::vector<VFootQuality> m_Feet;
+	/// How high the performer's feet stand by the take over where they stand in the bind pose, in mm: the median over
+	/// the frames. The floor of the take, or of the performer, is elsewhere then.
+	double m_Floor = 0.0;
 	std::vector<VBendQuality> m_Bends;
 	std::vector<VRangeQuality> m_Ranges;
 	/// The largest of each segment.

@@ -8,7 +8,7 @@ namespace
 {
 
 constexpr double c_StandingSpeed = 200.0;
-constexpr double c_StandingHeight = 50.0;
+constexpr double c_StandingHeight = 30.0;
 constexpr double c_ShortestStand = 0.1;
 
 } // namespace
