@@ -83,14 +83,14 @@ std::string FeetTable(const VSolveResult& i_rResult)
 {
 	VTable table;
 	table.AddColumn("FOOT", VTable::ELeft);
-	for (const char* pTitle :
-	    {"STANDS, FRAMES", "SLIDES", "PERFORMER'S", "AT FRAME", "HIGHEST", "AT FRAME", "LOWEST", "AT FRAME"})
+	for (const char* pTitle : {"STANDS, FRAMES", "SLIDES", "PERFORMER'S", "AT FRAME", "HIGHEST", "AT FRAME", "LOWEST",
+	         "OF ALL FRAMES", "AT FRAME"})
 		table.AddColumn(pTitle, VTable::ERight);
 	for (const VFootQuality& rFoot : i_rResult.m_rReport.m_Feet)
 		table.AddRow({i_rResult.m_rTarget.m_Segments[rFoot.m_Target].m_Name, std::to_string(rFoot.m_StandingFrames),
 		    Fixed(rFoot.m_Slide, 1), Fixed(rFoot.m_SourceSlide, 1), std::to_string(rFoot.m_SlideFrame),
-		    Fixed(rFoot.m_Highest, 1), std::to_string(rFoot.m_HighestFrame), Fixed(rFoot.m_Lowest, 1),
-		    std::to_string(rFoot.m_LowestFrame)});
+		    Fixed(rFoot.m_Highest, 1), std::to_string(rFoot.m_HighestFrame), Fixed(rFoot.m_LowestStanding, 1),
+		    Fixed(rFoot.m_Lowest, 1), std::to_string(rFoot.m_LowestFrame)});
 	return table.Text(HasColours(STDOUT_FILENO), TerminalWidth());
 }
 
@@ -235,7 +235,8 @@ VJson SolveToJson(const VSolveResult& i_rResult)
 		    {"standing", rFoot.m_StandingFrames}, {"slide", Rounded(rFoot.m_Slide)},
 		    {"performerSlide", Rounded(rFoot.m_SourceSlide)}, {"slideFrame", rFoot.m_SlideFrame},
 		    {"highest", Rounded(rFoot.m_Highest)}, {"highestFrame", rFoot.m_HighestFrame},
-		    {"lowest", Rounded(rFoot.m_Lowest)}, {"lowestFrame", rFoot.m_LowestFrame}});
+		    {"lowestStanding", Rounded(rFoot.m_LowestStanding)}, {"lowest", Rounded(rFoot.m_Lowest)},
+		    {"lowestFrame", rFoot.m_LowestFrame}});
 	VJson bends = VJson::array();
 	for (const VBendQuality& rBend : rReport.m_Bends)
 		bends.push_back({{"name", rBend.m_Name}, {"side", SideWord(rBend.m_Side)},

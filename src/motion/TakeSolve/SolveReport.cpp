@@ -135,6 +135,8 @@ public:
 					m_Quality.m_Highest = m_Heights[i];
 					m_Quality.m_HighestFrame = i_First + i;
 				}
+				if (bFirst || m_Heights[i] < m_Quality.m_LowestStanding)
+					m_Quality.m_LowestStanding = m_Heights[i];
 				bFirst = false;
 				const double way = slide(m_TargetPlaces, rStand.m_First, i);
 				if (way > m_Quality.m_Slide)

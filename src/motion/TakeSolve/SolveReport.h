@@ -40,6 +40,7 @@ struct VFootQuality
 	/// Over the standing frames.
 	double m_Highest = 0.0;
 	std::size_t m_HighestFrame = 0;
+	double m_LowestStanding = 0.0;
 	/// Over all frames; negative is through the floor.
 	double m_Lowest = 0.0;
 	std::size_t m_LowestFrame = 0;
