@@ -154,7 +154,7 @@ TEST(TakeSolve, LeavesOutAndTells)
 	EXPECT_EQ(solve.Findings().size(), 2u);
 	EXPECT_TRUE(Tells(solve.Findings(), "left-out", "Target #0"));
 	EXPECT_TRUE(
-	    Tells(solve.Findings(), "left-out", "#6 is left out of the solve: the performer has no segment \"Tail\""));
+	    Tells(solve.Findings(), "left-out", "#6 is left out of the solve. The performer has no segment \"Tail\""));
 	const VSolvedTake solved = scene.Solved(0, 5);
 	EXPECT_EQ(scene.Report(solved).m_Targets[6].m_Frames, 0u);
 	EXPECT_EQ(scene.Report(solved).m_Targets[7].m_Frames, 6u);

@@ -23,8 +23,8 @@ struct VTargetQuality
 };
 
 /// A foot of the character while that of the performer stands: hardly moves, near to where it is lowest. Heights are of
-/// whichever of ankle and toe is lower, over its own height in the bind pose, in which feet are taken to stand, and over
-/// VSolveReport::m_Floor.
+/// whichever of ankle and toe is lower, over its own height in the bind pose, in which feet are taken to stand, and
+/// over VSolveReport::m_Floor.
 struct VFootQuality
 {
 	SetupProposal::ESide m_Side = SetupProposal::ESide::None;

@@ -63,10 +63,9 @@ VTakeSolve::VTakeSolve(const VSubject& i_rTarget, std::span<const double> i_Bind
 		const std::string& rReason = m_Solver.LeftOut(i);
 		if (!rReason.empty() || !missing.empty())
 			m_Findings.push_back({"left-out",
-			    "Target #" + std::to_string(i) + " is left out of the solve: "
-			        + (rReason.empty() ? "the performer has no segment \"" + missing + "\" that it could follow"
-			                           : rReason)
-			        + "."});
+			    "Target #" + std::to_string(i) + " is left out of the solve. "
+			        + (rReason.empty() ? "The performer has no segment \"" + missing + "\" that it could follow."
+			                           : rReason)});
 	}
 }
 
