@@ -198,11 +198,17 @@ TEST(Solve, PlaysATakeThroughASubject)
 	    {"no pair", with({"--joint", "Hips"}), 2, "", "\"Hips\" is not JOINT:SEGMENT"},
 	    {"two results", with({"--csv", "--json"}), 2, "", "--csv and --json both print the result"},
 	    {"no drawing", with({"--plot", "c.qrr"}), 2, "", "is an input that saving there would destroy"},
+	    {"no character", with({"-o", "walk.glb"}), 2, "", "that form holds the character, too: --fbx names its"},
 	    {"no performer", {"performer", take, "-o", "p.bvh"}, 2, "", "let the name of its file end in .qrs"},
 	};
 	RunRows(rows, folder);
 	EXPECT_EQ(folder.Run(with({"--plot", "plot.svg"})).m_Status, 0);
 	EXPECT_TRUE(folder.Read("plot.svg").starts_with("<svg "));
+	// What is handed on is the character's file with that motion, and reads as such.
+	EXPECT_EQ(folder.Run(with({"-o", "walk.fbx", "--fbx", c_Fbx, "-q"})).m_Status, 0);
+	const VJson motion =
+	    RunJson({"take", "walk.fbx", "--stack", "chest_yxz_120fps", "--rate", "120", "--json", "-q"}, folder);
+	EXPECT_EQ(motion.at("frames"), 61);
 }
 
 TEST(Dump, SpellsAsTheSchemaDoes)

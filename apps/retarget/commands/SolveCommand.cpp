@@ -5,6 +5,7 @@
 #include "retarget/subject/SolvePlot.h"
 #include "retarget/subject/SolveText.h"
 #include "retarget/subject/TakeFile.h"
+#include "retarget/text/MotionFile.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/OutputFile.h"
 
@@ -13,7 +14,9 @@
 #include "CoreOrlexTypesUtils/joints/PoseVector.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
+#include "RetargetSetupCore/GlobalScale.h"
 #include "TakeSolve/Performer.h"
+#include "TakeSolve/SolvedMotion.h"
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
 
@@ -42,6 +45,7 @@ struct VSolveSettings
 	std::optional<double> m_MaximumRotation;
 	bool m_bCsv = false;
 	VOutput m_Plot;
+	VMotionOutput m_Motion;
 };
 
 /// A subject in numbers, with the states of its bind pose.
@@ -152,13 +156,27 @@ std::string BeyondLimits(const VSolveSettings& i_rSettings, const VSolveResult& 
 	return text;
 }
 
-EExitStatus Solve(const VSolveSettings& i_rSettings)
+/// Before anything is read: what is written, and that it is no input.
+void CheckOutputs(VSolveSettings& io_rSettings)
 {
+	std::vector<std::string> inputs{io_rSettings.m_Subject, io_rSettings.m_Take, io_rSettings.m_Source};
+	if (!io_rSettings.m_Plot.m_Path.empty())
+		CheckOutput(io_rSettings.m_Plot, c_DrawingFile, inputs);
+	VMotionOutput& rMotion = io_rSettings.m_Motion;
+	if (rMotion.m_Path.empty())
+		return;
+	rMotion.m_bForce = io_rSettings.m_Plot.m_bForce;
+	rMotion.m_Name = StemOf(io_rSettings.m_Take);
+	inputs.push_back(rMotion.m_Character);
+	CheckMotionOutput(rMotion, inputs);
+}
+
+EExitStatus Solve(VSolveSettings i_Settings)
+{
+	CheckOutputs(i_Settings);
+	const VSolveSettings& i_rSettings = i_Settings;
 	if (i_rSettings.m_bCsv && JsonAsked())
 		throw VCommandError(EWrongUsage, "--csv and --json both print the result: give one of them");
-	if (!i_rSettings.m_Plot.m_Path.empty())
-		CheckOutput(
-		    i_rSettings.m_Plot, c_DrawingFile, {i_rSettings.m_Subject, i_rSettings.m_Take, i_rSettings.m_Source});
 
 	VSession session;
 	session.LoadTarget(i_rSettings.m_Subject);
@@ -204,6 +222,12 @@ EExitStatus Solve(const VSolveSettings& i_rSettings)
 	for (std::size_t i = 0; i < target.m_Subject.m_Targets.size(); ++i)
 		result.m_TargetNames.push_back(i < rNamed.size() ? rNamed[i].m_Name : std::string());
 
+	if (!i_Settings.m_Motion.m_Path.empty())
+	{
+		i_Settings.m_Motion.m_Scale = RetargetSetup::GetGlobalScale(session.Target());
+		WriteMotionFile(
+		    TakeSolve::MotionOf(target.m_Subject, target.m_BindPose, solved, pTake->m_Rate), i_Settings.m_Motion);
+	}
 	if (!i_rSettings.m_Plot.m_Path.empty())
 	{
 		RequireNoErrors();
@@ -232,6 +256,7 @@ VCommand AddSolveCommand(CLI::App& io_rProgram)
 	    "solve is our own stand-in: the host's may weigh things differently",
 	    {"solve hero.qrr --take walk.bvh --source performer.qrs",
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --frames 1:200 --plot walk.svg",
+	        "solve hero.qrr --take walk.bvh --source performer.qrs --fbx hero.fbx -o hero_walk.fbx",
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --max-position 50 --max-rotation 20 -q",
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --json | jq '.targets[] | {name, p95}'"});
 	const auto pSettings = std::make_shared<VSolveSettings>();
@@ -283,6 +308,14 @@ VCommand AddSolveCommand(CLI::App& io_rProgram)
 	    "Print a line for each frame instead: number, seconds, converged, iterations, and how far each target is off");
 	pApp->add_option("--plot", pSettings->m_Plot.m_Path, "Draw how far the targets are off over the frames")
 	    ->option_text("OUT.svg")
+	    ->check(NotEmpty());
+	pApp->add_option("-o,--output", pSettings->m_Motion.m_Path,
+	        "Where the character's motion is written: .bvh, .glb (glTF binary: the character with its skin) or .fbx "
+	        "(the character's own binary file with one more animation stack)")
+	    ->option_text("OUT")
+	    ->check(NotEmpty());
+	pApp->add_option("--fbx", pSettings->m_Motion.m_Character, "The character's FBX file, which .glb and .fbx need")
+	    ->option_text("FILE.fbx")
 	    ->check(NotEmpty());
 	AddForceOption(*pApp, pSettings->m_Plot);
 	return {pApp, [pSettings] { return Solve(*pSettings); }};
