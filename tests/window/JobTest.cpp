@@ -5,10 +5,15 @@
 #include "studio/host/OpenGLCheck.h"
 #include "studio/host/Services.h"
 
+#include <QApplication>
+#include <QComboBox>
 #include <QFile>
 #include <QGuiApplication>
 #include <QQuickItem>
 #include <QStyleHints>
+#include <QTableWidget>
+#include <QTest>
+#include <QWindow>
 
 namespace
 {
@@ -346,6 +351,102 @@ TEST_F(Job, UndoesAndRedoes)
 	    == CommandLine({"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"),
 	        "--match-file-pose", "--position", "Pelvis:haunch", "--position", "Cranium:skull"}));
 	EXPECT_FALSE(m_pWindow->isWindowModified());
+}
+
+TEST_F(Job, JudgesProposedTargets)
+{
+	VOperator& rOperator = *m_pOperator;
+	CreateTargetSubject();
+	SelectPair("Cranium", "skull");
+	const auto selection = [this] { return m_pWindow->Context().GetSelectionManager()->Selection().Items(); };
+	const auto before = selection();
+	const auto open = [&]() -> QWidget&
+	{
+		rOperator.ChooseInMenu("ToolsMenu", "ProposeTargets");
+		auto* const pDialog = m_pWindow->findChild<QWidget*>("ProposeTargets");
+		EXPECT_EVENTUALLY(pDialog && pDialog->windowHandle() && pDialog->windowHandle()->isExposed());
+		return *pDialog;
+	};
+	const auto click = [](QWidget& i_rDialog, const QWidget& i_rWidget, const QPoint& i_rPlace)
+	{
+		QTest::mouseClick(i_rDialog.windowHandle(), Qt::LeftButton, {}, i_rWidget.mapTo(&i_rDialog, i_rPlace));
+		QTest::qWait(0);
+	};
+	const auto press = [&](QWidget& i_rDialog, const char* i_pButton)
+	{
+		const auto* const pButton = i_rDialog.findChild<QWidget*>(i_pButton);
+		click(i_rDialog, *pButton, pButton->rect().center());
+		EXPECT_EVENTUALLY(!m_pWindow->findChild<QWidget*>("ProposeTargets"));
+		m_pWindow->activateWindow();
+		EXPECT_TRUE(QTest::qWaitForWindowActive(m_pWindow.get()));
+	};
+	const auto itemOf = [](const QTableWidget& i_rTable, const char* i_pSource)
+	{ return i_rTable.findItems(i_pSource, Qt::MatchExactly).value(0); };
+
+	{
+		QWidget& rDialog = open();
+		const auto& rTable = *rDialog.findChild<QTableWidget*>("Pairs");
+		auto* const pItem = itemOf(rTable, "L_Humerus");
+		ASSERT_TRUE(pItem);
+		EXPECT_TRUE(rTable.item(pItem->row(), 4)->text().contains("name")) << "a reason";
+		click(rDialog, *rTable.viewport(), rTable.visualItemRect(rTable.item(pItem->row(), 4)).center());
+		ASSERT_EQ(selection().size(), 2u);
+		EXPECT_EQ(Names("sourceSegments").value(int(selection()[0].m_ElementIndex)), "L_Humerus");
+		EXPECT_EQ(Names("targetSegments").value(int(selection()[1].m_ElementIndex)), "upperArmLeft");
+		press(rDialog, "ProposeCancel");
+		EXPECT_EQ(Targets(), 0);
+		EXPECT_EQ(selection(), before);
+	}
+	{
+		press(open(), "ProposeAdd");
+		EXPECT_GT(Targets(), 20);
+		EXPECT_EQ(selection(), before);
+		rOperator.Click("saveAs");
+		rOperator.AnswerDialog(File("all.qrr"));
+		EXPECT_EVENTUALLY(QFile::exists(File("all.qrr")));
+		EXPECT_TRUE(Content("all.qrr")
+		    == CommandLine({"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"),
+		        "--match-file-pose", "--auto"}));
+		EXPECT_EQ(rOperator.ChooseInMenu("EditMenu", "Undo"), "&Undo Propose Targets");
+		EXPECT_EQ(Targets(), 0) << "one step";
+	}
+	{
+		QWidget& rDialog = open();
+		const auto& rTable = *rDialog.findChild<QTableWidget*>("Pairs");
+		const auto ticks = [&]
+		{
+			int count = 0;
+			for (int row = 0; row < rTable.rowCount(); ++row)
+				count += rTable.item(row, 0)->checkState() == Qt::Checked;
+			return count;
+		};
+		// All but two rows lose their ticks; one of the two gets another target.
+		for (int row = 0; row < rTable.rowCount(); ++row)
+		{
+			const auto* const pItem = rTable.item(row, 0);
+			if (pItem->checkState() != Qt::Checked || pItem->text() == "L_Humerus" || pItem->text() == "Cranium")
+				continue;
+			const_cast<QTableWidget&>(rTable).scrollToItem(pItem);
+			const QRect place = rTable.visualItemRect(pItem);
+			click(rDialog, *rTable.viewport(), {place.left() + 10, place.center().y()});
+		}
+		EXPECT_EQ(ticks(), 2);
+		auto* const pItem = itemOf(rTable, "L_Humerus");
+		const_cast<QTableWidget&>(rTable).scrollToItem(pItem);
+		auto* const pBox = qobject_cast<QComboBox*>(rTable.cellWidget(pItem->row(), 1));
+		click(rDialog, *pBox, pBox->rect().center());
+		ASSERT_TRUE(Eventually([] { return QApplication::activePopupWidget() != nullptr; }));
+		for (const Qt::Key key : {Qt::Key_End, Qt::Key_Return})
+			QTest::keyClick(QApplication::activePopupWidget()->windowHandle(), key);
+		const QString last = Names("targetSegments").last();
+		EXPECT_EVENTUALLY(pBox->currentText() == last);
+		EXPECT_EQ(rTable.item(pItem->row(), 4)->text(), "chosen by hand");
+		press(rDialog, "ProposeAdd");
+		EXPECT_EQ(rOperator.Property("targetsRow0", "visible").toBool(), true);
+		EXPECT_TRUE(Targets() >= 2 && Targets() <= 4);
+		rOperator.Key(Qt::Key_Z, Qt::ControlModifier);
+		EXPECT_EQ(Targets(), 0);
+	}
 }
 
 TEST_F(Job, ALegacyFileIsSavedUnderANewName)

@@ -9,6 +9,7 @@
 #include "RetargetSetupCore/TargetConstruction.h"
 
 #include <utility>
+#include <vector>
 
 namespace CommandLine
 {
@@ -30,18 +31,6 @@ VMapped Mapped(VSession& io_rSession, SetupProposal::VRestSkeleton i_Target)
 	mapped.m_Proposal = SetupProposal::Propose(mapped.m_Source, mapped.m_Target, io_rSession.m_MinimumScore);
 	mapped.m_Root = SetupProposal::BodyRoot(mapped.m_Proposal, mapped.m_Target);
 	return mapped;
-}
-
-void Add(VSession& io_rSession, const SetupProposal::VProposedPair& i_rPair, bool i_bPosition, double i_Weight)
-{
-	const std::size_t index = io_rSession.Target().m_Targets.size();
-	io_rSession.Document().AddTarget(int(i_rPair.m_Source), int(i_rPair.m_Target), i_bPosition, false);
-	CoreOrlexTypes::VSubjectParametrised subject = io_rSession.Target();
-	// The pair has one of this kind.
-	if (subject.m_Targets.size() == index)
-		return;
-	subject.m_Targets[index].m_Weight = i_Weight;
-	io_rSession.Document().SetTargetSubjectParametrised(subject);
 }
 
 } // namespace
@@ -80,15 +69,15 @@ void AddProposedTargets(VSession& io_rSession)
 		    "--auto: no pair of segments scores enough; \"retarget map\" shows what there is, --min-score before "
 		    "--auto "
 		    "asks for less");
-	const bool bEachPairOnce = std::exchange(io_rSession.Rules().m_bEachPairOnce, true);
+	std::vector<RetargetSetup::VNewTarget> targets;
 	for (const SetupProposal::VProposedPair& rPair : rProposal.m_Pairs)
 	{
 		if (rPair.m_PositionWeight > 0.0)
-			Add(io_rSession, rPair, true, rPair.m_PositionWeight);
+			targets.push_back({rPair.m_Source, rPair.m_Target, true, rPair.m_PositionWeight});
 		if (rPair.m_RotationWeight > 0.0)
-			Add(io_rSession, rPair, false, rPair.m_RotationWeight);
+			targets.push_back({rPair.m_Source, rPair.m_Target, false, rPair.m_RotationWeight});
 	}
-	io_rSession.Rules().m_bEachPairOnce = bEachPairOnce;
+	io_rSession.Document().AddTargets(targets);
 	NVX_LOG(c_pCategory, NVX::ELogInformation, "--auto: %1% pairs of segments, %2% segments of the source without one",
 	    rProposal.m_Pairs.size(), rProposal.m_UnmappedSources.size());
 }

@@ -44,8 +44,6 @@ public:
 	/// document knows the file by a name until then.
 	void ForgetNamelessFiles();
 
-	/// What the document asks its host for.
-	TesselPluginInterface::VHostRules& Rules() { return m_pApplication->m_Rules; }
 	/// With --json where the subject was saved and what it holds; what edits have to tell, unless the subject itself
 	/// went to standard output.
 	void Report(const std::string& i_rPath) const;

@@ -38,7 +38,8 @@ constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubje
     {"LoadTargetSubjectURL", "Load"}, {"SaveTargetSubjectURL", "Save"}, {"AddTarget", "Add target"},
     {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"},
     {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"MatchFilePose", "Take pose from FBX"},
-    {"UpdateTargets", "Update targets"}, {"RestoreTargetSubjectURL", "Restore"}};
+    {"UpdateTargets", "Update targets"}, {"ProposeTargets", "Propose Targets"}, {"AddTargets", "Propose Targets"},
+    {"RestoreTargetSubjectURL", "Restore"}};
 
 /// By objectName, of what can be seen.
 QQuickItem* ItemNamed(QQuickItem& i_rItem, const QString& i_rName)
@@ -73,6 +74,9 @@ VRetargetPanel::VRetargetPanel(
 	connect(m_pDocument, SIGNAL(targetSubjectLoaded(QUrl)), this, SLOT(TellUsed(QUrl)));
 	connect(m_pDocument, SIGNAL(targetSubjectSaved(QUrl)), this, SLOT(TellUsed(QUrl)));
 	connect(m_pDocument, SIGNAL(unsavedChangesChanged()), this, SIGNAL(stateChanged()));
+	for (const char* const pName : {"SourceSegmentModel", "TargetSegmentModel"})
+		if (const QAbstractItemModel* const pModel = Model(pName))
+			connect(pModel, &QAbstractItemModel::modelReset, this, &VRetargetPanel::segmentsChanged);
 	if (auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data()))
 		connect(pQuickWidget, &QQuickWidget::statusChanged, this, &VRetargetPanel::FollowRootItem);
 	FollowRootItem();
@@ -188,10 +192,7 @@ void VRetargetPanel::MakeStartPage()
 	m_pStartPage =
 	    MakeOverlay("StartPage.qml", {{"parent", QVariant::fromValue(pView->parentItem())}, {"texts", texts}});
 	connect(m_pStartPage.get(), SIGNAL(chosen(int)), this, SLOT(Begin(int)), Qt::QueuedConnection);
-	for (const char* const pName : {"SourceSegmentModel", "TargetSegmentModel"})
-		if (const QAbstractItemModel* const pModel = Model(pName))
-			connect(
-			    pModel, &QAbstractItemModel::modelReset, this, &VRetargetPanel::UpdateStartPage, Qt::UniqueConnection);
+	connect(this, &VRetargetPanel::segmentsChanged, this, &VRetargetPanel::UpdateStartPage, Qt::UniqueConnection);
 	UpdateStartPage();
 }
 
@@ -302,6 +303,40 @@ QString VRetargetPanel::AskDocument(const char* i_pQuestion) const
 void VRetargetPanel::EndStep()
 {
 	QMetaObject::invokeMethod(m_pDocument, "EndStep");
+}
+
+QVariantMap VRetargetPanel::ProposeTargets(double i_LeastScore)
+{
+	ApplyTyped();
+	QVariantMap proposal;
+	QMetaObject::invokeMethod(m_pDocument, "ProposeTargets", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, proposal),
+	    Q_ARG(double, i_LeastScore));
+	return proposal;
+}
+
+void VRetargetPanel::AddTargets(const QVariantList& i_rTargets)
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(m_pDocument, "AddTargets", Q_ARG(QVariantList, i_rTargets));
+}
+
+QStringList VRetargetPanel::SegmentsOf(const char* i_pModel) const
+{
+	const QAbstractItemModel* const pModel = Model(i_pModel);
+	QStringList names;
+	for (int row = 0; pModel && row < pModel->rowCount(); ++row)
+		names << pModel->index(row, 0).data(pModel->roleNames().key("name")).toString();
+	return names;
+}
+
+std::vector<NVX::ISelectionItem> VRetargetPanel::SegmentItems(int i_Source, int i_Target) const
+{
+	std::vector<NVX::ISelectionItem> items;
+	for (const auto& [pName, row] : {std::pair("SourceSegmentModel", i_Source), {"TargetSegmentModel", i_Target}})
+		if (const QAbstractItemModel* const pModel = Model(pName); pModel && row >= 0 && row < pModel->rowCount())
+			items.push_back(
+			    pModel->index(row, 0).data(pModel->roleNames().key("selectionItem")).value<NVX::ISelectionItem>());
+	return items;
 }
 
 void VRetargetPanel::SaveAs()

@@ -77,6 +77,16 @@ public:
 	/// The next edit is a step of its own, even of the same field.
 	void EndStep();
 
+	/// What the document proposes, see its function of this name; empty if it proposes nothing, which is told.
+	QVariantMap ProposeTargets(double i_LeastScore);
+	/// In one step.
+	void AddTargets(const QVariantList& i_rTargets);
+	/// By name.
+	QStringList SourceSegments() const { return SegmentsOf("SourceSegmentModel"); }
+	QStringList TargetSegments() const { return SegmentsOf("TargetSegmentModel"); }
+	/// Of a segment of the performer and one of the character, for the selection; -1 for none.
+	std::vector<NVX::ISelectionItem> SegmentItems(int i_Source, int i_Target) const;
+
 	/// Empty if there is a target subject.
 	QString WhyNotSave() const;
 
@@ -113,6 +123,9 @@ signals:
 	/// The current file is another one, or what is unsaved has changed.
 	void stateChanged();
 
+	/// The segments of performer or character may be others.
+	void segmentsChanged();
+
 	void ready();
 
 private:
@@ -127,6 +140,7 @@ private:
 	/// An item of its QML that can be seen, by objectName; null if there is none.
 	QQuickItem* Item(const char* i_pName) const;
 	std::unique_ptr<QObject> MakeOverlay(const char* i_pFile, const QVariantMap& i_rProperties) const;
+	QStringList SegmentsOf(const char* i_pModel) const;
 	/// A list that the panel shows to its QML; null if there is none.
 	const QAbstractItemModel* Model(const char* i_pName) const;
 	/// Where a file of this kind stands, in pixels of the panel; empty for nowhere.

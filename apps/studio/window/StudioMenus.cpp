@@ -12,6 +12,7 @@
 #include "studio/window/EditKeys.h"
 #include "studio/window/Named.h"
 #include "studio/window/PreferencesDialog.h"
+#include "studio/window/ProposeDialog.h"
 
 #include <QAction>
 #include <QDialog>
@@ -88,6 +89,7 @@ void VStudioWindow::MakeMenus(bool i_bDeveloper)
 	MakeFileMenu();
 	MakeEditMenu();
 	MakeViewMenu(i_bDeveloper);
+	MakeToolsMenu();
 	MakeHelpMenu();
 }
 
@@ -195,6 +197,25 @@ void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
 		AddAction(rMenu, "Reload", tr("&Reload QML"), QKeySequence(Qt::Key_F5),
 		    [this] { m_pGui->QuickEngine().ReloadSignal().Fire(); });
 	}
+}
+
+void VStudioWindow::MakeToolsMenu()
+{
+	QMenu& rMenu = *Named(menuBar()->addMenu(tr("T&ools")), "ToolsMenu", tr("Tools"));
+	AddAction(rMenu, "ProposeTargets", tr("&Propose Targets..."), QKeySequence(QStringLiteral("Ctrl+P")),
+	    [this] { ShowProposal(); });
+}
+
+void VStudioWindow::ShowProposal()
+{
+	if (auto* const pShown = findChild<QDialog*>(QStringLiteral("ProposeTargets")))
+	{
+		pShown->raise();
+		return pShown->activateWindow();
+	}
+	// Why there is none is told.
+	if (m_pRetargetPanel && !m_pRetargetPanel->ProposeTargets(0.0).isEmpty())
+		(new VProposeDialog(*m_pRetargetPanel, m_pContext->GetSelectionManager()->Selection(), this))->show();
 }
 
 void VStudioWindow::MakeHelpMenu()

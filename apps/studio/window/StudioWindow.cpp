@@ -16,6 +16,7 @@
 #include "studio/window/SkinProgress.h"
 
 #include <QCloseEvent>
+#include <QDialog>
 #include <QDir>
 #include <QDockWidget>
 #include <QFileInfo>
@@ -144,6 +145,7 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 void VStudioWindow::UnloadModule()
 {
 	m_pWorkKeeper.reset();
+	delete findChild<QDialog*>(QStringLiteral("ProposeTargets"));
 	m_pRetargetPanel.reset();
 	UpdateTitle();
 	m_pGui->PanelManager().Clear();

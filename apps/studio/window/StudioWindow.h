@@ -67,6 +67,7 @@ private:
 	void MakeFileMenu();
 	void MakeEditMenu();
 	void MakeViewMenu(bool i_bDeveloper);
+	void MakeToolsMenu();
 	void MakeHelpMenu();
 	QAction* AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText, const QKeySequence& i_rShortcut,
 	    std::function<void()> i_Run);
@@ -76,6 +77,7 @@ private:
 	/// @return empty if no file was chosen.
 	QString AskWhereToSave();
 	void UpdateRecentFiles();
+	void ShowProposal();
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
 	void ShowOperatorPage();

@@ -23,6 +23,7 @@ inline constexpr const char* c_OwnJoints =
     "The target subject has joints, post poses or parameters of its own, which the pose of an FBX file does not fit.";
 inline constexpr const char* c_HostRefused = "The host took no item for the change, so everything stays as it was.";
 inline constexpr const char* c_TargetKept = "The target subject has changes that are not saved, and stays.";
+inline constexpr const char* c_PairsAreThere = "There is nothing to add: all these targets are there already.";
 inline constexpr const char* c_NothingToUndo = "There is nothing to undo.";
 inline constexpr const char* c_NothingToRedo = "There is nothing to redo.";
 /// The target's name is %1%.

@@ -4,7 +4,10 @@
 #include "NVX/Signal.h"
 #include "RetargetSetupCore/BindPose.h"
 #include "RetargetSetupCore/History.h"
+#include "RetargetSetupCore/RetargetTargets.h"
+#include "RetargetSetupCore/SourceAlignment.h"
 #include "RetargetSetupCore/TargetState.h"
+#include "SetupProposal/Proposal.h"
 #include "TesselPluginInterface/IDispatcher.h"
 #include "TesselPluginInterface/IFlowFrame.h"
 #include "TesselPluginInterface/IHostRules.h"
@@ -88,6 +91,18 @@ public:
 	/// wants each pair once, a target that is there already is told by TargetFound.
 	void AddTarget(int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry);
 	void RemoveTarget(int i_TargetIndex);
+
+	/// What is proposed for the source and the target subject as they stand; the joints are their segments.
+	/// @return nothing if one of the two is missing or makes no tree.
+	std::optional<SetupProposal::VProposal> ProposeTargets(double i_LeastScore);
+	/// Adds them in one step, with their weights; one that is there already is left as it is.
+	void AddTargets(const std::vector<RetargetSetup::VNewTarget>& i_rTargets);
+
+	/// Brings the bind pose of the target subject to that of the source, and measures the offsets of all targets anew.
+	/// @param i_Way what several tries are one step by, see VEdit.
+	/// @return how it was brought there; nothing if there is no change.
+	std::optional<SetupProposal::VAlignment> AlignToSource(
+	    const RetargetSetup::VAlignmentChoice& i_rChoice, std::uint64_t i_Way = 0);
 
 	/// Gives every segment a joint; those that have one keep it.
 	void CreateAllJoints();
@@ -324,6 +339,17 @@ private:
 	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities);
 	VIdentities NewIdentities() { return {++m_LastIdentity, {}}; }
 	void TakeExtras(CoreOrlexQRTIO::VSubjectQRTExtras i_Extras);
+
+	/// Source and target subject as they stand in their bind poses.
+	struct VBothPosed
+	{
+		VSubjectValues m_Source;
+		VSubjectValues m_Target;
+		const ComputeSubject::VComputeSubjectFK* m_pSourceFK;
+		std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pTargetFK;
+	};
+	/// Nothing, and the command is ignored, if one of them is missing or makes no tree.
+	std::optional<VBothPosed> BothPosed(const char* i_pCommand);
 
 	/// The source subject at rest in its bind pose; null if it has none. Kept until the source subject is another one.
 	const ComputeSubject::VComputeSubjectFK* SourceKinematics();

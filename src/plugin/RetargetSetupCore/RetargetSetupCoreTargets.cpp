@@ -8,6 +8,7 @@
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/Joints.h"
 #include "RetargetSetupCore/Partner.h"
+#include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/StepNames.h"
@@ -88,28 +89,42 @@ std::int32_t VRetargetSetupCore::PartnerOf(const VSubjectValues& i_rValues, std:
 	    : RetargetSetup::FindMirrorSegment(*i_rValues.m_pParametrised, i_SegmentIndex);
 }
 
+std::optional<VRetargetSetupCore::VBothPosed> VRetargetSetupCore::BothPosed(const char* i_pCommand)
+{
+	VBothPosed both{SourceValues(), TargetValues(), nullptr, nullptr};
+	const auto ignore = [&](const char* i_pReason)
+	{
+		CommandIgnored(i_pCommand, i_pReason);
+		return std::nullopt;
+	};
+	if (!both.m_Source.m_pParametrised)
+		return ignore(Ignored::c_NoSource);
+	if (!IsWhole(both.m_Target))
+		return ignore(Ignored::c_NoTarget);
+	both.m_pSourceFK = SourceKinematics();
+	if (!both.m_pSourceFK)
+		return ignore(Ignored::c_SourceNoTree);
+	both.m_pTargetFK = TargetKinematics(both.m_Target);
+	if (!both.m_pTargetFK)
+		return ignore(Ignored::c_TargetNoTree);
+	return both;
+}
+
 void VRetargetSetupCore::AddTarget(
     int i_SourceSegmentIndex, int i_TargetSegmentIndex, bool i_bPosition, bool i_bSymmetry)
 {
 	constexpr const char* c_Command = "AddTarget";
-	const VSubjectValues source = SourceValues();
-	const VSubjectValues target = TargetValues();
+	const std::optional<VBothPosed> both = BothPosed(c_Command);
+	if (!both)
+		return;
+	const VSubjectValues& source = both->m_Source;
+	const VSubjectValues& target = both->m_Target;
 	const auto sourceIndex = std::uint32_t(i_SourceSegmentIndex);
 	const auto targetIndex = std::uint32_t(i_TargetSegmentIndex);
-	if (!source.m_pParametrised)
-		return CommandIgnored(c_Command, Ignored::c_NoSource);
-	if (!IsWhole(target))
-		return CommandIgnored(c_Command, Ignored::c_NoTarget);
 	if (sourceIndex >= source.m_pParametrised->m_Segments.size())
 		return CommandIgnored(c_Command, Ignored::c_NoSourceSegment);
 	if (targetIndex >= target.m_pParametrised->m_Segments.size())
 		return CommandIgnored(c_Command, Ignored::c_NoTargetSegment);
-	const VComputeSubjectFK* const pSourceFK = SourceKinematics();
-	if (!pSourceFK)
-		return CommandIgnored(c_Command, Ignored::c_SourceNoTree);
-	const auto pTargetFK = TargetKinematics(target);
-	if (!pTargetFK)
-		return CommandIgnored(c_Command, Ignored::c_TargetNoTree);
 
 	VSubjectParametrised subject = *target.m_pParametrised;
 	VSubjectApplicationData applicationData = *target.m_pApplicationData;
@@ -122,8 +137,8 @@ void VRetargetSetupCore::AddTarget(
 		                                 : -1;
 		if (there != -1)
 			return found.push_back(there);
-		RetargetSetup::AddTargetPair(
-		    *pSourceFK, *pTargetFK, i_Source, i_Target, i_bPosition, *source.m_pParametrised, subject, applicationData);
+		RetargetSetup::AddTargetPair(*both->m_pSourceFK, *both->m_pTargetFK, i_Source, i_Target, i_bPosition,
+		    *source.m_pParametrised, subject, applicationData);
 	};
 	addPair(sourceIndex, targetIndex);
 	if (i_bSymmetry)
@@ -156,6 +171,67 @@ void VRetargetSetupCore::AddTarget(
 	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), m_Target.m_Identities);
 }
 
+void VRetargetSetupCore::AddTargets(const std::vector<RetargetSetup::VNewTarget>& i_rTargets)
+{
+	constexpr const char* c_Command = "AddTargets";
+	const std::optional<VBothPosed> both = BothPosed(c_Command);
+	if (!both)
+		return;
+	const VSubjectValues& source = both->m_Source;
+	const VSubjectValues& target = both->m_Target;
+	VSubjectParametrised subject = *target.m_pParametrised;
+	VSubjectApplicationData applicationData = *target.m_pApplicationData;
+	for (const RetargetSetup::VNewTarget& rNew : i_rTargets)
+	{
+		if (rNew.m_Source >= source.m_pParametrised->m_Segments.size())
+			return CommandIgnored(c_Command, Ignored::c_NoSourceSegment);
+		if (rNew.m_Target >= subject.m_Segments.size())
+			return CommandIgnored(c_Command, Ignored::c_NoTargetSegment);
+		if (RetargetSetup::FindTargetPair(
+		        subject, source.m_pParametrised->m_Segments[rNew.m_Source].m_Name, rNew.m_Target, rNew.m_bPosition)
+		    != -1)
+			continue;
+		RetargetSetup::AddTargetPair(*both->m_pSourceFK, *both->m_pTargetFK, rNew.m_Source, rNew.m_Target,
+		    rNew.m_bPosition, *source.m_pParametrised, subject, applicationData);
+		subject.m_Targets.back().m_Weight = rNew.m_Weight;
+	}
+	if (subject.m_Targets.size() == target.m_pParametrised->m_Targets.size())
+		return CommandIgnored(c_Command, Ignored::c_PairsAreThere);
+	const VStep step(*this, {Steps::c_ProposeTargets});
+	ReplaceTarget(c_Command, std::move(subject),
+	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), m_Target.m_Identities);
+}
+
+std::optional<SetupProposal::VProposal> VRetargetSetupCore::ProposeTargets(double i_LeastScore)
+{
+	const std::optional<VBothPosed> both = BothPosed("ProposeTargets");
+	if (!both)
+		return std::nullopt;
+	return SetupProposal::Propose(RetargetSetup::RestOf(*both->m_Source.m_pParametrised, *both->m_Source.m_pSubject),
+	    RetargetSetup::RestOf(*both->m_Target.m_pParametrised, *both->m_Target.m_pSubject), i_LeastScore);
+}
+
+std::optional<SetupProposal::VAlignment> VRetargetSetupCore::AlignToSource(
+    const RetargetSetup::VAlignmentChoice& i_rChoice, std::uint64_t i_Way)
+{
+	constexpr const char* c_Command = "AlignToSource";
+	const std::optional<VBothPosed> both = BothPosed(c_Command);
+	if (!both)
+		return std::nullopt;
+	const VSubjectValues& source = both->m_Source;
+	const VSubjectValues& target = both->m_Target;
+	std::string reason;
+	auto aligned = RetargetSetup::AlignToSource(
+	    *source.m_pParametrised, *source.m_pSubject, *target.m_pParametrised, *target.m_pSubject, i_rChoice, reason);
+	if (!aligned)
+	{
+		CommandIgnored(c_Command, reason);
+		return std::nullopt;
+	}
+	SetTargetSubjectParametrised(std::move(aligned->m_Subject), {Steps::c_Align, i_Way});
+	return std::move(aligned->m_Alignment);
+}
+
 void VRetargetSetupCore::RemoveTarget(int i_TargetIndex)
 {
 	constexpr const char* c_Command = "RemoveTarget";
@@ -176,20 +252,13 @@ void VRetargetSetupCore::RemoveTarget(int i_TargetIndex)
 void VRetargetSetupCore::UpdateTargets()
 {
 	constexpr const char* c_Command = "UpdateTargets";
-	const VSubjectValues source = SourceValues();
-	const VSubjectValues target = TargetValues();
-	if (!source.m_pParametrised)
-		return CommandIgnored(c_Command, Ignored::c_NoSource);
-	if (!IsWhole(target))
-		return CommandIgnored(c_Command, Ignored::c_NoTarget);
-	const VComputeSubjectFK* const pSourceFK = SourceKinematics();
-	if (!pSourceFK)
-		return CommandIgnored(c_Command, Ignored::c_SourceNoTree);
-	const auto pTargetFK = TargetKinematics(target);
-	if (!pTargetFK)
-		return CommandIgnored(c_Command, Ignored::c_TargetNoTree);
+	const std::optional<VBothPosed> both = BothPosed(c_Command);
+	if (!both)
+		return;
+	const VSubjectValues& source = both->m_Source;
+	const VSubjectValues& target = both->m_Target;
 	VSubjectParametrised subject = *target.m_pParametrised;
-	RetargetSetup::UpdateTargetStates(*pSourceFK, *pTargetFK, *source.m_pParametrised, subject);
+	RetargetSetup::UpdateTargetStates(*both->m_pSourceFK, *both->m_pTargetFK, *source.m_pParametrised, subject);
 	const VStep step(*this, {Steps::c_UpdateTargets});
 	ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities);
 }

@@ -20,6 +20,15 @@ class VComputeSubjectFK;
 namespace RetargetSetup
 {
 
+/// A target that is to be added, by the indices of its segments.
+struct VNewTarget
+{
+	std::size_t m_Source = 0;
+	std::size_t m_Target = 0;
+	bool m_bPosition = false;
+	double m_Weight = 1.0;
+};
+
 /// The name of the source segment: of the first marker for a position target, of the first rotation observation for any
 /// other. Null if the target names none, or one that is not there.
 const std::string* SourceName(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,

@@ -7,6 +7,7 @@
 #include <QMatrix4x4>
 #include <QObject>
 #include <QUrl>
+#include <QVariant>
 
 #include <memory>
 
@@ -45,6 +46,16 @@ public:
 	Q_INVOKABLE void MatchFilePose() { VRetargetSetupCore::MatchFilePose(); }
 	Q_INVOKABLE void UpdateTargets() { VRetargetSetupCore::UpdateTargets(); }
 	Q_INVOKABLE bool HasUnsavedChanges() const { return VRetargetSetupCore::HasUnsavedChanges(); }
+
+	// For a host that offers the tools beyond the panel. Segments go by index, pairs of them are maps: "source",
+	// "target", "score", "reasons", the weights "position" and "rotation" of the targets that the pair should get, and
+	// "present" for a pair that has them.
+
+	/// Lists of maps: "pairs", "alternatives", "unmapped" of the source with "reason"; and "findings", sentences on how
+	/// the two stand. Empty if nothing can be proposed, which commandIgnored tells.
+	Q_INVOKABLE QVariantMap ProposeTargets(double i_LeastScore);
+	/// @param i_rTargets maps of "source", "target", "position" (else it is one of rotation) and "weight".
+	Q_INVOKABLE void AddTargets(const QVariantList& i_rTargets);
 
 	// For a host that offers Undo and Redo.
 
