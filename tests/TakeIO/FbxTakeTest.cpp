@@ -83,6 +83,59 @@ INSTANTIATE_TEST_SUITE_P(Rows, FbxCurve,
         VCurveRow{"TcbBroken", {0x208}, {0, 0.5, 0, 0}, {{2, 8.125}}}),
     [](const auto& i_rInfo) { return std::string(i_rInfo.param.m_pName); });
 
+/// Before version 7 letters tell what lies between the keys.
+TEST(FbxCurve, OfOldFilesHasTheValuesComputedByHand)
+{
+	const std::tuple<std::string, std::string, std::string, std::vector<std::pair<double, double>>> rows[]{
+	    {"L", "L", "L", {{0.5, 3}, {2, 7}, {5, 8}}}, {"C,s", "C,n", "C,s", {{0.9, 0}, {2, 8}}},
+	    {"U,s,3,1,n", "U,b,2,-1,n", "L", {{0.5, 3.25}, {2, 7.75}}},
+	    // The secants 6 and 1 by their times: 8 / 3 at the key within; straight at both ends.
+	    {"U,a,n", "U,a,n", "U,a,n", {{0.5, 3.4166666667}, {2, 7.4166666667}}},
+	    {"U,s,2,2,a,1,1", "L", "L", {{0.4375, 1.5}}}};
+	for (const auto& [first, second, third, values] : rows)
+	{
+		SCOPED_TRACE(first + ' ' + second);
+		const std::string bytes = "; FBX 6.1.0 project file\nKey: 0,0," + first + ",46186158000,6," + second
+		    + ",138558474000,8," + third + "\n";
+		FbxFormat::VElementTree tree;
+		ASSERT_TRUE(tree.Read(bytes, FbxFormat::DetectFileKind(bytes)));
+		FbxFormat::VDecodeBudget budget;
+		VFbxCurve curve;
+		ASSERT_TRUE(curve.ReadKeys(tree, tree.Find(0, "Key"), budget));
+		for (const auto& [time, value] : values)
+			EXPECT_NEAR(curve.At(time * c_Second), value, 1e-6) << time;
+	}
+	for (const char* pKeys :
+	    {"", "0", "0,0", "0,0,X", "0,0,U,z,n", "0,0,U,s,1,1", "5,0,L,5,1,L", "0,nan,L", "0,1e10,L"})
+	{
+		const std::string bytes = std::string("; FBX 6.1.0 project file\nKey: ") + pKeys + "\n";
+		FbxFormat::VElementTree tree;
+		tree.Read(bytes, FbxFormat::DetectFileKind(bytes));
+		FbxFormat::VDecodeBudget budget;
+		EXPECT_FALSE(VFbxCurve().ReadKeys(tree, tree.Find(0, "Key"), budget)) << pKeys;
+	}
+}
+
+/// Two keys at 0 and 0.8 seconds, which automatic slopes join by a straight line: 16.40997 and -37.80411 degrees about
+/// z.
+TEST(FbxTake, OfAnOldFileIsRead)
+{
+	VTake take;
+	std::string error;
+	ASSERT_TRUE(ReadTake(
+	    RETARGET_TEST_DATA "/fbx/ufbx_max_transformed_skin_zup_b6100.fbx", {{}, {}, 30.0, "Take 001"}, take, error))
+	    << error;
+	ASSERT_EQ(take.m_Frames, 101u);
+	EXPECT_EQ(take.m_Joints[1].m_Name, "Bone002");
+	for (const auto& [frame, degrees] :
+	    {std::pair(0u, 16.40997), {12u, -10.69707}, {24u, -37.80411}, {100u, -37.80411}})
+	{
+		const Rotation::VVector3 turn = Rotation::AngleAxisFromRotationMatrix(LocalPose(take, 1, frame).R);
+		EXPECT_NEAR(turn[2], degrees * 3.14159265358979 / 180.0, 1e-6) << frame;
+		EXPECT_NEAR(turn[0], 0.0, 1e-5);
+	}
+}
+
 /// Weights of 1 are 9999, two in one number; as text its bits are printed as a whole number.
 TEST(FbxCurve, WeightedSlopesBendTime)
 {
@@ -184,7 +237,8 @@ TEST(FbxTake, ThatCannotBeReadIsRefused)
 	    {TakeFile(c_Forms[1]), {{}, {}, {}, "run"}, "It has no such stack. It has: walk, other"},
 	    {TakeFile(c_Forms[1]), {{}, {}, {}, "other"}, "Nothing moves in its stack \"other\""},
 	    {TakeFile(c_Forms[1], "1e18"), {}, "Its stack \"walk\" lasts longer than such a file is read"},
-	    {Write(c_Forms[0], VTestScene{}), {}, "Takes are read from FBX files of version 7"},
+	    {Write(c_Forms[0], VTestScene{}), {}, "It has no joints"},
+	    {"; FBX 5.8.0 project file\n", {}, "It is no FBX file of version 6 or 7"},
 	    {Write(c_Forms[1], VTestScene{}), {}, "It has no joints"},
 	    {damaged, {}, "A curve of its stack \"walk\" is damaged or too large"},
 	    {TakeFile(c_Forms[1]).substr(0, 900), {},

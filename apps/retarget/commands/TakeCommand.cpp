@@ -115,7 +115,8 @@ EExitStatus RunTake(VTakeCommand i_Command)
 VCommand AddTakeCommand(CLI::App& io_rProgram)
 {
 	CLI::App* const pApp = AddCommand(io_rProgram, "take",
-	    "Show what recorded motion (BVH, FBX 7) holds: frames and rate, and the joints as a tree with length in mm "
+	    "Show what recorded motion (BVH, FBX 6 and 7) holds: frames and rate, and the joints as a tree with length in "
+	    "mm "
 	    "from the parent and channels, in our axes (Z up). What the file does not tell is guessed from its rest pose, "
 	    "and told. With -o it is written: as BVH, or on a character whose bones have the names of its joints",
 	    {"take walk.bvh", "take walk.bvh --unit cm --up z", "take hero.fbx --stack run --rate 30",

@@ -1,10 +1,12 @@
 #include "TakeIO/FbxCurve.h"
 
 #include "TakeIO/Limits.h"
+#include "fbxsdk/container/Values.h"
 
 #include <algorithm>
 #include <bit>
 #include <cmath>
+#include <limits>
 
 namespace
 {
@@ -86,9 +88,67 @@ bool TakeIO::VFbxCurve::Read(const VElementTree& i_rTree, VElementIndex i_Curve,
 			if (rKey.m_Flags & EWeightedNextLeft)
 				rKey.m_NextLeftWeight = std::clamp((weights >> 16) / c_WeightUnit, 0.0, 1.0);
 		}
-	SetSlopes();
-	return std::ranges::all_of(
-	    m_Keys, [](const VKey& i_rKey) { return std::isfinite(i_rKey.m_Right) && std::isfinite(i_rKey.m_NextLeft); });
+	return SetSlopes();
+}
+
+bool TakeIO::VFbxCurve::ReadKeys(const VElementTree& i_rTree, VElementIndex i_Keys, VDecodeBudget& io_rBudget)
+{
+	VValueCursor cursor(i_rTree, i_Keys);
+	// A letter is a word of the text form, a number of the binary one.
+	const auto letter = [&cursor]
+	{
+		const VValue value = cursor.Next();
+		return value.m_Kind == EValueKind::Word && value.m_Text.size() == 1 ? value.m_Text[0] : char(value.AsInteger());
+	};
+	m_Keys.clear();
+	for (VValue time = cursor.Next(); time.m_Kind != EValueKind::None; time = cursor.Next())
+	{
+		if (!io_rBudget.Take(sizeof(VKey)))
+			return false;
+		VKey& rKey = m_Keys.emplace_back();
+		rKey.m_Time = time.AsReal(std::numeric_limits<double>::quiet_NaN());
+		rKey.m_Value = cursor.Next().AsReal(std::numeric_limits<double>::quiet_NaN());
+		const bool bLater = m_Keys.size() < 2 || rKey.m_Time > m_Keys[m_Keys.size() - 2].m_Time;
+		if (!(std::abs(rKey.m_Value) <= Limits::c_Largest) || !std::isfinite(rKey.m_Time) || !bLater)
+			return false;
+		switch (letter())
+		{
+		case 'L': rKey.m_Flags = ELinear; continue;
+		case 'C': rKey.m_Flags = letter() == 'n' ? EConstant | ENext : EConstant; continue;
+		case 'U': break;
+		default: return false;
+		}
+		std::size_t numbers = 2;
+		switch (letter())
+		{
+		case 's': break;
+		case 'b': rKey.m_Flags = EBroken; break;
+		case 'a':
+			rKey.m_Flags = EAuto;
+			numbers = 0;
+			break;
+		case 't':
+			rKey.m_Flags = ETcb;
+			numbers = 3;
+			break;
+		default: return false;
+		}
+		for (std::size_t i = 0; i < numbers; ++i)
+			rKey.m_Data[i] = cursor.Next().AsReal();
+		const char weights = letter();
+		if (weights != 'n' && weights != 'r' && weights != 'l' && weights != 'a')
+			return false;
+		const auto weight = [&](std::uint32_t i_Flag, double& o_rWeight)
+		{
+			rKey.m_Flags |= i_Flag;
+			o_rWeight = std::clamp(cursor.Next().AsReal(1.0 / 3.0), 0.0, 1.0);
+		};
+		if (weights == 'r' || weights == 'a')
+			weight(EWeightedRight, rKey.m_RightWeight);
+		if (weights == 'l' || weights == 'a')
+			weight(EWeightedNextLeft, rKey.m_NextLeftWeight);
+	}
+	return !m_Keys.empty() && SetSlopes();
 }
 
 double TakeIO::VFbxCurve::Secant(std::size_t i_Key) const
@@ -135,7 +195,7 @@ double TakeIO::VFbxCurve::TcbSlope(std::size_t i_Key, bool i_bIn) const
 	    * ((1.0 + sign * continuity) * (1.0 + bias) * left + (1.0 - sign * continuity) * (1.0 - bias) * right);
 }
 
-void TakeIO::VFbxCurve::SetSlopes()
+bool TakeIO::VFbxCurve::SetSlopes()
 {
 	for (std::size_t i = 0; i < m_Keys.size(); ++i)
 	{
@@ -153,6 +213,8 @@ void TakeIO::VFbxCurve::SetSlopes()
 		    : rKey.m_Flags & ETcb               ? Secant(i)
 		                                        : rKey.m_Data[1];
 	}
+	return std::ranges::all_of(
+	    m_Keys, [](const VKey& i_rKey) { return std::isfinite(i_rKey.m_Right) && std::isfinite(i_rKey.m_NextLeft); });
 }
 
 double TakeIO::VFbxCurve::At(double i_Time) const

@@ -26,6 +26,10 @@ public:
 	bool Read(
 	    const FbxFormat::VElementTree& i_rTree, FbxFormat::VElementIndex i_Curve, FbxFormat::VDecodeBudget& io_rBudget);
 
+	/// The same of a record "Key" of versions before 7: of each key time, value and letters that tell the rest.
+	bool ReadKeys(
+	    const FbxFormat::VElementTree& i_rTree, FbxFormat::VElementIndex i_Keys, FbxFormat::VDecodeBudget& io_rBudget);
+
 	/// Time in ticks.
 	double At(double i_Time) const;
 	double FirstTime() const { return m_Keys.front().m_Time; }
@@ -50,7 +54,7 @@ private:
 	double Secant(std::size_t i_Key) const;
 	double AutoSlope(std::size_t i_Key) const;
 	double TcbSlope(std::size_t i_Key, bool i_bIn) const;
-	void SetSlopes();
+	bool SetSlopes();
 
 	std::vector<VKey> m_Keys;
 };

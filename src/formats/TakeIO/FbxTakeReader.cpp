@@ -6,6 +6,7 @@
 #include "TakeIO/FbxJoints.h"
 #include "TakeIO/Limits.h"
 #include "fbxsdk/container/FileKind.h"
+#include "fbxsdk/container/Values.h"
 #include "fbxsdk/document/Properties.h"
 
 #include <algorithm>
@@ -22,8 +23,8 @@ using namespace FbxFormat;
 using Rotation::VMatrix3;
 using Rotation::VVector3;
 
-/// The first version with animation stacks.
-constexpr std::uint32_t c_FirstVersion = 7000;
+/// Before it the motion of models stands in "Takes".
+constexpr std::uint32_t c_FirstVersionWithStacks = 7000;
 
 /// Of a small file less than c_Values: a stack may claim to last for years.
 constexpr double c_ValuesOfAny = 2e6;
@@ -32,12 +33,30 @@ constexpr double c_ValuesPerByte = 16.0;
 constexpr std::string_view c_Animated[]{"Lcl Translation", "Lcl Rotation", "Lcl Scaling"};
 constexpr std::string_view c_Components[]{"d|X", "d|Y", "d|Z"};
 
+/// Channels of the same, before version 7.
+constexpr std::string_view c_Kinds = "TRS";
+constexpr std::string_view c_Axes = "XYZ";
+
+/// Of a name of one letter; npos if it is none of them.
+std::size_t PlaceIn(std::string_view i_Letters, std::string_view i_Name)
+{
+	return i_Name.size() == 1 ? i_Letters.find(i_Name) : std::string_view::npos;
+}
+
 /// A coordinate: a curve, or what stands still.
 struct VComponent
 {
 	double m_Value = 0.0;
 	bool m_bGiven = false;
 	std::optional<VFbxCurve> m_Curve;
+};
+
+/// Or a take of a file before version 7, which is no object.
+struct VStack
+{
+	VObjectIndex m_Object = c_NoObject;
+	VElementIndex m_Element = c_NoElement;
+	std::string_view m_Name;
 };
 
 struct VNode : VFbxJoint
@@ -59,13 +78,14 @@ public:
 	bool Read()
 	{
 		m_rTake = {};
-		const VFileKind kind = DetectFileKind(m_Bytes);
-		if (kind.m_Version < c_FirstVersion || kind.m_Version >= c_TooNewVersion)
-			return Fail("Takes are read from FBX files of version 7");
 		if (!m_Records.Read(m_Bytes, m_Error))
 			return false;
 		m_Budget.m_BytesLeft = FbxFormat::Limits::DecodedBytes(m_Bytes.size());
-		return ReadSettings() && FindNodes() && FindStack() && ReadCurves() && FindSpan() && Sample();
+		if (!ReadSettings() || !FindNodes())
+			return false;
+		const bool bTakes = m_Records.Kind().m_Version < c_FirstVersionWithStacks;
+		return (bTakes ? ListTakes() : ListStacks()) && ChooseStack() && (bTakes ? ReadChannels() : ReadCurves())
+		    && SpreadScaling() && FindSpan() && Sample();
 	}
 
 	std::string m_Error;
@@ -109,26 +129,120 @@ private:
 		return true;
 	}
 
-	bool FindStack()
+	bool ListStacks()
 	{
 		for (VObjectIndex object = 0; object < m_Records.Document().Objects().size(); ++object)
 			if (IsOf(object, "AnimationStack"))
-			{
-				const std::string name = m_Records.Document().Decoded(Object(object).m_Name);
-				m_Names += (m_Names.empty() ? "" : ", ") + name;
-				++m_Stacks;
-				if (m_Stack == c_NoObject && m_rSettings.m_Stack.value_or(name) == name)
-				{
-					m_Stack = object;
-					m_StackName = name;
-				}
-			}
-		if (m_Stack == c_NoObject)
-			return Fail(m_Stacks == 0 ? "It holds no animation stack" : "It has no such stack. It has: " + m_Names);
-		if (m_Stacks > 1 && !m_rSettings.m_Stack)
-			NVX_LOG("TakeIO", NVX::ELogWarning, "Of its %1% stacks the first is read, \"%2%\". It has: %3%", m_Stacks,
-			    m_StackName, m_Names);
+				m_Stacks.push_back({object, Object(object).m_Element, Object(object).m_Name});
 		return true;
+	}
+
+	bool ListTakes()
+	{
+		const VElementTree& rTree = m_Records.Tree();
+		for (const VElementIndex take : rTree.Children(rTree.Find(VElementTree::c_Root, "Takes")))
+			if (rTree.Name(take) == "Take")
+				m_Stacks.push_back({c_NoObject, take, ValueAt(rTree, take, 0).m_Text});
+		return true;
+	}
+
+	bool ChooseStack()
+	{
+		std::string names;
+		bool bFound = false;
+		for (const VStack& rStack : m_Stacks)
+		{
+			const std::string name = m_Records.Document().Decoded(rStack.m_Name);
+			names += (names.empty() ? "" : ", ") + name;
+			if (bFound || m_rSettings.m_Stack.value_or(name) != name)
+				continue;
+			m_Stack = rStack;
+			m_StackName = name;
+			bFound = true;
+		}
+		if (!bFound)
+			return Fail(m_Stacks.empty() ? "It holds no animation stack" : "It has no such stack. It has: " + names);
+		if (m_Stacks.size() > 1 && !m_rSettings.m_Stack)
+			NVX_LOG("TakeIO", NVX::ELogWarning, "Of its %1% stacks the first is read, \"%2%\". It has: %3%",
+			    m_Stacks.size(), m_StackName, names);
+		return true;
+	}
+
+	bool KeepKeys(const VFbxCurve& i_rCurve, bool i_bSound)
+	{
+		if (!i_bSound)
+			return Fail("A curve of its stack \"" + m_StackName + "\" is damaged or too large");
+		m_FirstKey = std::min(m_FirstKey, i_rCurve.FirstTime());
+		m_LastKey = std::max(m_LastKey, i_rCurve.LastTime());
+		return true;
+	}
+
+	/// Calls i_Visit(name, channel) for each channel right below one, or below a model.
+	template <typename TVisit>
+	bool ForEachChannel(VElementIndex i_Of, TVisit&& i_Visit) const
+	{
+		const VElementTree& rTree = m_Records.Tree();
+		for (const VElementIndex channel : rTree.Children(i_Of))
+			if (rTree.Name(channel) == "Channel" && !i_Visit(ValueAt(rTree, channel, 0).m_Text, channel))
+				return false;
+		return true;
+	}
+
+	/// What moves before version 7: models by name, and in them channels inside channels.
+	bool ReadChannels()
+	{
+		const VElementTree& rTree = m_Records.Tree();
+		std::map<std::string_view, VNode*> byName;
+		for (VNode& rNode : m_Nodes)
+			byName.try_emplace(Object(rNode.m_Object).m_Name, &rNode);
+		for (const VElementIndex model : rTree.Children(m_Stack.m_Element))
+		{
+			const auto found = byName.find(SplitFullName(ValueAt(rTree, model, 0).m_Text).m_Name);
+			if (rTree.Name(model) != "Model" || found == byName.end())
+				continue;
+			VNode& rNode = *found->second;
+			const bool bRead = ForEachChannel(model,
+			    [&](std::string_view i_Name, VElementIndex i_Transform)
+			    {
+				    return i_Name != "Transform"
+				        || ForEachChannel(i_Transform,
+				            [&](std::string_view i_Kind, VElementIndex i_Channel)
+				            { return ReadChannel(rNode, PlaceIn(c_Kinds, i_Kind), i_Channel); });
+			    });
+			if (!bRead)
+				return false;
+		}
+		return true;
+	}
+
+	/// @param i_Kind place, rotation or scaling
+	bool ReadChannel(VNode& io_rNode, std::size_t i_Kind, VElementIndex i_Channel)
+	{
+		const VElementTree& rTree = m_Records.Tree();
+		return i_Kind == std::string_view::npos
+		    || ForEachChannel(i_Channel,
+		        [&](std::string_view i_Axis, VElementIndex i_Component)
+		        {
+			        const std::size_t axis = PlaceIn(c_Axes, i_Axis);
+			        if (axis == std::string_view::npos)
+				        return true;
+			        VComponent& rComponent = io_rNode.m_Components[3 * i_Kind + axis];
+			        if (const VElementIndex value = rTree.Find(i_Component, "Default"); value != c_NoElement)
+			        {
+				        rComponent.m_Value = ValueAt(rTree, value, 0).AsReal();
+				        rComponent.m_bGiven = std::abs(rComponent.m_Value) <= TakeIO::Limits::c_Largest;
+				        io_rNode.m_bMoves = true;
+			        }
+			        const VElementIndex keys = rTree.Find(i_Component, "Key");
+			        if (keys == c_NoElement)
+				        return true;
+			        VFbxCurve& rCurve = rComponent.m_Curve.emplace();
+			        if (!KeepKeys(rCurve, rCurve.ReadKeys(rTree, keys, m_Budget)))
+				        return false;
+			        io_rNode.m_bMoves = true;
+			        io_rNode.m_bScales = io_rNode.m_bScales || (i_Kind == 2 && rCurve.LastTime() > rCurve.FirstTime());
+			        return true;
+		        });
 	}
 
 	/// The curves of the first layer, and no others, are inflated.
@@ -137,7 +251,7 @@ private:
 		VObjectIndex layer = c_NoObject;
 		std::size_t layers = 0;
 		for (const VConnection& rConnection : m_Records.Document().Connections())
-			if (rConnection.m_Parent == m_Stack && IsOf(rConnection.m_Child, "AnimationLayer"))
+			if (rConnection.m_Parent == m_Stack.m_Object && IsOf(rConnection.m_Child, "AnimationLayer"))
 				layer = layers++ == 0 ? rConnection.m_Child : layer;
 		if (layers > 1)
 			NVX_LOG("TakeIO", NVX::ELogWarning, "Layers of the stack \"%1%\" that are left out: %2%", m_StackName,
@@ -181,12 +295,18 @@ private:
 			for (VComponent* const pFirst : moved[rConnection.m_Parent])
 			{
 				std::optional<VFbxCurve>& rCurve = pFirst[pComponent - c_Components].m_Curve;
-				if (!rCurve.emplace().Read(m_Records.Tree(), Object(rConnection.m_Child).m_Element, m_Budget))
-					return Fail("A curve of its stack \"" + m_StackName + "\" is damaged or too large");
-				m_FirstKey = std::min(m_FirstKey, rCurve->FirstTime());
-				m_LastKey = std::max(m_LastKey, rCurve->LastTime());
+				const bool bSound =
+				    rCurve.emplace().Read(m_Records.Tree(), Object(rConnection.m_Child).m_Element, m_Budget);
+				if (!KeepKeys(*rCurve, bSound))
+					return false;
 			}
 		}
+		return true;
+	}
+
+	/// What scales moves what is below it.
+	bool SpreadScaling()
+	{
 		for (VNode& rNode : m_Nodes)
 			if (rNode.m_Parent >= 0 && m_Nodes[std::size_t(rNode.m_Parent)].m_bScales)
 				rNode.m_bMoves = rNode.m_bScales = true;
@@ -197,7 +317,13 @@ private:
 	bool FindSpan()
 	{
 		double start = 0.0, stop = 0.0;
-		VisitProperties(m_Records.Tree(), Object(m_Stack).m_Element,
+		const VElementTree& rTree = m_Records.Tree();
+		if (const VElementIndex span = rTree.Find(m_Stack.m_Element, "LocalTime"); span != c_NoElement)
+		{
+			start = ValueAt(rTree, span, 0).AsReal();
+			stop = ValueAt(rTree, span, 1).AsReal();
+		}
+		VisitProperties(rTree, m_Stack.m_Element,
 		    [&](std::string_view i_Name, VValueCursor& io_rCursor)
 		    {
 			    if (i_Name == "LocalStart")
@@ -289,10 +415,9 @@ private:
 	std::vector<VNode> m_Nodes;
 	/// By object; -1 of what is no joint.
 	std::vector<std::int32_t> m_NodeOf;
-	VObjectIndex m_Stack = c_NoObject;
+	std::vector<VStack> m_Stacks;
+	VStack m_Stack;
 	std::string m_StackName;
-	std::string m_Names;
-	std::size_t m_Stacks = 0;
 	double m_FirstKey = std::numeric_limits<double>::infinity();
 	double m_LastKey = -std::numeric_limits<double>::infinity();
 	double m_Start = 0.0;

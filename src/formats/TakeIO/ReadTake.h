@@ -21,8 +21,8 @@ struct VTakeSettings
 	std::optional<std::string> m_Stack{};
 };
 
-/// Reads a take from a file of any kind that is known; BVH, and FBX of version 7. What is guessed, mended or left out
-/// is told in the log category "TakeIO".
+/// Reads a take from a file of any kind that is known; BVH, and FBX of versions 6 and 7. What is guessed, mended or
+/// left out is told in the log category "TakeIO".
 /// @return false if it cannot be read; then o_rTake is as it was, and o_rError tells why, with the line.
 bool ReadTake(const std::string& i_rPath, const VTakeSettings& i_rSettings, VTake& o_rTake, std::string& o_rError);
 
