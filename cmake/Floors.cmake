@@ -1,11 +1,11 @@
 # The floors of the house, from the ground: the wings of src/, and the libraries of each. A wing uses only wings below
 # it, a library of its own wing only those that stand before it. The order is also the order of building.
 set(RETARGET_WINGS base model kinematics toolbox formats motion hostdata scene plugin)
-set(RETARGET_WING_base host math numerics UtilsFileSystem FileSystemWatcher)
+set(RETARGET_WING_base host math numerics UtilsFileSystem FileDigest FileSystemWatcher)
 set(RETARGET_WING_model CoreOrlexTypes)
 set(RETARGET_WING_kinematics ComputeSubjectFK ComputeSubjectSolve)
 set(RETARGET_WING_toolbox CoreOrlexTypesUtils SetupProposal)
-set(RETARGET_WING_formats UtilsRapidXml CoreOrlexQRTIO fbxsdk FBXIO TakeIO MotionIO)
+set(RETARGET_WING_formats UtilsRapidXml CoreOrlexQRTIO fbxsdk FBXIO TakeIO MotionIO SetupIO)
 set(RETARGET_WING_motion TakeSolve)
 set(RETARGET_WING_hostdata TesselDataStore TesselParameters TesselParametersGUI Flow2TypesUtils InMemoryHost)
 set(RETARGET_WING_scene CoreGraphics OrlexGraphics Flow2Graphics)

@@ -239,6 +239,13 @@ bool StrictAsked()
 	return rInbox.m_Settings.m_bStrict;
 }
 
+void AskStrict()
+{
+	VInbox& rInbox = Inbox();
+	const std::lock_guard lock(rInbox.m_Mutex);
+	rInbox.m_Settings.m_bStrict = true;
+}
+
 void HoldMessages()
 {
 	VInbox& rInbox = Inbox();

@@ -63,6 +63,8 @@ void PrintMessage(const NVX::VLogCategory& i_rCategory, int i_Level, const std::
 
 bool JsonAsked();
 bool StrictAsked();
+/// As if --strict had been given.
+void AskStrict();
 
 /// From here on messages wait, so that what a later step mends need not be told.
 void HoldMessages();

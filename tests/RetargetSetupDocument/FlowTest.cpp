@@ -8,13 +8,13 @@
 #include "InMemoryHost/Application.h"
 #include "RetargetSetupCore/FilePath.h"
 #include "RetargetSetupCore/RootHeight.h"
+#include "SetupIO/ReadSetup.h"
 
 #include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
 #include <limits>
 #include <numbers>
-#include <sstream>
 
 namespace
 {
@@ -39,24 +39,20 @@ protected:
 	/// The pairs of the demo's mapping file, through the commands that QML calls.
 	void AddDemoTargets()
 	{
-		std::stringstream mapping(Get(c_Demo / "mapping.txt"));
+		SetupIO::VSetup mapping;
+		SetupIO::VFault fault;
+		ASSERT_TRUE(SetupIO::ReadSetup(Get(c_Demo / "mapping.json"), mapping, fault)) << fault.m_Reason;
 		VSubjectParametrised source;
 		ASSERT_TRUE(m_Document.GetSourceSubject(source));
-		bool bSymmetry = false;
-		for (std::string option, pair; mapping >> option;)
+		for (const SetupIO::VPair& rPair : mapping.m_Pairs)
 		{
-			if (option == "--symmetry" || option == "--no-symmetry")
-			{
-				bSymmetry = option == "--symmetry";
-				continue;
-			}
-			mapping >> pair;
-			const std::size_t colon = pair.find(':');
-			const int sourceIndex = IndexOf(source, pair.substr(0, colon));
-			const int targetIndex = IndexOf(Target(), pair.substr(colon + 1));
-			ASSERT_TRUE(sourceIndex >= 0 && targetIndex >= 0) << pair;
-			QMetaObject::invokeMethod(&m_Document, "AddTarget", Q_ARG(int, sourceIndex), Q_ARG(int, targetIndex),
-			    Q_ARG(bool, option == "--position"), Q_ARG(bool, bSymmetry));
+			const int sourceIndex = IndexOf(source, rPair.m_Source);
+			const int targetIndex = IndexOf(Target(), rPair.m_Target);
+			ASSERT_TRUE(sourceIndex >= 0 && targetIndex >= 0) << rPair.m_Source;
+			for (const bool bPosition : {true, false})
+				if (bPosition ? rPair.m_Position : rPair.m_Rotation)
+					QMetaObject::invokeMethod(&m_Document, "AddTarget", Q_ARG(int, sourceIndex),
+					    Q_ARG(int, targetIndex), Q_ARG(bool, bPosition), Q_ARG(bool, false));
 		}
 	}
 };

@@ -86,8 +86,9 @@ TEST_F(Input, OutputThatCannotBeWritten)
 	    {
 	        {"no folder", {"create", "--fbx", c_Fbx, "-o", "no/x.qrr"}, 4, "",
 	            "error QRTIO: Error opening file 'no/x.qrr' for writing"},
-	        {"a folder", {"schema", "-o", "folder.xsd"}, 4, "", "\"folder.xsd\" could not be written"},
-	        {"schema", {"schema", "-o", "no/x.xsd"}, 4, "", "error retarget: \"no/x.xsd\" could not be written"},
+	        {"a folder", {"schema", "-o", "folder.xsd"}, 4, "", "Could not save 'folder.xsd': it is a folder"},
+	        {"schema", {"schema", "-o", "no/x.xsd"}, 4, "",
+	            "error retarget: Could not save 'no/x.xsd': there is no folder"},
 	    },
 	    m_Folder);
 }

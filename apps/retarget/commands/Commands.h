@@ -22,6 +22,8 @@ VCommand AddTargetsCommand(CLI::App& io_rProgram);
 VCommand AddCheckCommand(CLI::App& io_rProgram);
 VCommand AddDiffCommand(CLI::App& io_rProgram);
 VCommand AddCreateCommand(CLI::App& io_rProgram);
+VCommand AddPresetCommand(CLI::App& io_rProgram);
+VCommand AddBuildCommand(CLI::App& io_rProgram);
 VCommand AddEditCommand(CLI::App& io_rProgram);
 VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender);
 /// Hidden: prints the manual page or the shell completion of the option table.

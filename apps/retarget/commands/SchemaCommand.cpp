@@ -1,4 +1,5 @@
 #include "retarget/commands/Commands.h"
+#include "retarget/subject/Edits.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/OutputFile.h"
 
@@ -9,15 +10,14 @@ namespace CommandLine
 namespace
 {
 
-EExitStatus ShowSchema(const VOutput& i_rOut)
+constexpr const char* c_pSetup = "setup";
+
+EExitStatus ShowSchema(const std::string& i_rOf, const VOutput& i_rOut)
 {
-	CheckOutput(i_rOut, c_SchemaFile);
-	CoreOrlexQRTIO::VReader reader;
-	if (i_rOut.m_Path == "-")
-		Print(reader.SchemaText());
-	else if (!reader.WriteSchema(i_rOut.m_Path))
-		throw VCommandError(EBadOutput, "\"" + i_rOut.m_Path + "\" could not be written");
-	else
+	const bool bSetup = i_rOf == c_pSetup;
+	CheckOutput(i_rOut, bSetup ? c_SetupFile : c_SchemaFile);
+	WriteText(bSetup ? SetupIO::SchemaText(EditForms()) : CoreOrlexQRTIO::VReader().SchemaText(), i_rOut.m_Path);
+	if (i_rOut.m_Path != "-")
 		PrintResult({{"output", i_rOut.m_Path}}, "");
 	return EFine;
 }
@@ -27,14 +27,21 @@ EExitStatus ShowSchema(const VOutput& i_rOut)
 VCommand AddSchemaCommand(CLI::App& io_rProgram)
 {
 	CLI::App* const pApp = AddCommand(io_rProgram, "schema",
-	    "Print the XML schema of the skeleton file format. The reader takes more than XML's own tools do with it: "
-	    "names with blanks, and targets of different kinds in any order",
-	    {"schema > skeleton.xsd", "schema -o skeleton.xsd && xmllint --noout --schema skeleton.xsd performer.qrs"});
+	    "Print the XML schema of the skeleton file format, or the JSON schema of set-ups: mappings, presets, files of "
+	    "edits and recipes. The reader of skeleton files takes more than XML's own tools do with it: names with "
+	    "blanks, "
+	    "and targets of different kinds in any order",
+	    {"schema > skeleton.xsd", "schema -o skeleton.xsd && xmllint --noout --schema skeleton.xsd performer.qrs",
+	        "schema setup -o setup.json"});
+	const auto pOf = std::make_shared<std::string>("skeleton");
+	pApp->add_option("KIND", *pOf, "What the schema is of: skeleton or setup (default: skeleton)")
+	    ->option_text("skeleton|setup")
+	    ->check(CLI::IsMember({"skeleton", c_pSetup}));
 	const auto pOut = std::make_shared<VOutput>(VOutput{"-"});
 	pApp->add_option("-o,--output", pOut->m_Path, "Where the schema is written; - is standard output (the default)")
 	    ->option_text("FILE");
 	AddForceOption(*pApp, *pOut);
-	return {pApp, [pOut] { return ShowSchema(*pOut); }};
+	return {pApp, [pOf, pOut] { return ShowSchema(*pOf, *pOut); }};
 }
 
 } // namespace CommandLine

@@ -77,16 +77,6 @@ std::string ToText(
 	    + Fixed(Rounded(i_rAlignment.m_LiftMm, 1), 1) + " mm\n";
 }
 
-/// How source and target subject stand now.
-std::vector<SetupProposal::VPoseFinding> FindingsOf(VSession& io_rSession)
-{
-	const auto source = io_rSession.Document().SourceValues();
-	const auto target = io_rSession.Document().TargetValues();
-	const auto sourceRest = RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject);
-	const auto targetRest = RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject);
-	return SetupProposal::CheckPose(sourceRest, targetRest, SetupProposal::Propose(sourceRest, targetRest));
-}
-
 } // namespace
 
 void ChooseChain(VSession& io_rSession, const std::string& i_rChain)
@@ -127,15 +117,24 @@ void AlignTarget(VSession& io_rSession)
 	for (const auto& rChain : aligned->m_Alignment.m_Refused)
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "--align: the %1% stays as it is: %2%", rChain.m_Chain, rChain.m_Reason);
 	io_rSession.m_ReportJson["aligned"] = ToJson(aligned->m_Alignment, rSource, aligned->m_Subject);
-	const auto findings = FindingsOf(io_rSession);
+	const auto findings = PoseFindingsOf(io_rSession);
 	io_rSession.m_ReportJson["pose"] = PoseJson(findings);
 	io_rSession.m_ReportText += ToText(aligned->m_Alignment, rSource, aligned->m_Subject) + PoseText(findings);
+}
+
+std::vector<SetupProposal::VPoseFinding> PoseFindingsOf(VSession& io_rSession)
+{
+	const auto source = io_rSession.Document().SourceValues();
+	const auto target = io_rSession.Document().TargetValues();
+	const auto sourceRest = RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject);
+	const auto targetRest = RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject);
+	return SetupProposal::CheckPose(sourceRest, targetRest, SetupProposal::Propose(sourceRest, targetRest));
 }
 
 double ScaleThatFits(VSession& io_rSession)
 {
 	io_rSession.Source("--scale fit");
-	for (const SetupProposal::VPoseFinding& rFinding : FindingsOf(io_rSession))
+	for (const SetupProposal::VPoseFinding& rFinding : PoseFindingsOf(io_rSession))
 		for (const auto& [pName, value] : rFinding.m_Numbers)
 			if (std::string_view(pName) == "scale")
 				return value * io_rSession.Document().GetTargetScale();

@@ -2,7 +2,10 @@
 
 #include "retarget/subject/Session.h"
 
+#include "SetupProposal/PoseCheck.h"
+
 #include <string>
+#include <vector>
 
 /// The bind pose of the target subject, brought to the source's. All throw VCommandError to fail.
 namespace CommandLine
@@ -17,6 +20,9 @@ void LockSegment(VSession& io_rSession, const std::string& i_rSegment);
 /// "--align": with the angles before and after in what the session reports. Chains that would stand worse stay, which
 /// is a warning. A subject that stands as it was made takes the pose of its FBX file first.
 void AlignTarget(VSession& io_rSession);
+
+/// How source and target subject stand now.
+std::vector<SetupProposal::VPoseFinding> PoseFindingsOf(VSession& io_rSession);
 
 /// The scale with which the hips of the target subject stand as high above its feet as the source's. EFindings if one
 /// of the two has no hips or feet.

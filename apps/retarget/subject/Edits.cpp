@@ -5,18 +5,16 @@
 #include "CommandLineText/Suggest.h"
 #include "retarget/subject/Aligning.h"
 #include "retarget/subject/Mapping.h"
-#include "retarget/text/InputFile.h"
+#include "retarget/subject/SetupFile.h"
 
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
-#include "NVX/Status.h"
 #include "RetargetSetupCore/GlobalScale.h"
 #include "RetargetSetupCore/Partner.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/RootHeight.h"
 #include "SetupProposal/Side.h"
-#include "UtilsFileSystem/Files.h"
 #include "math/NumberText.h"
 
 #include <algorithm>
@@ -142,6 +140,11 @@ void AllowPartial(VSession& io_rSession, const std::string&)
 void Auto(VSession& io_rSession, const std::string&)
 {
 	AddProposedTargets(io_rSession);
+}
+
+void Preset(VSession& io_rSession, const std::string& i_rPath)
+{
+	ApplyPreset(io_rSession, i_rPath);
 }
 
 void MinimumScore(VSession& io_rSession, const std::string& i_rScore)
@@ -292,6 +295,11 @@ constexpr VEditKind c_Kinds[] = {
         "Add targets for all pairs of segments that \"retarget map\" proposes, with the kinds and weights that it "
         "suggests; a pair that has such a target keeps it",
         Auto},
+    {"--preset", "FILE",
+        "Add targets for the pairs of a preset: by names or, where one is not there, by what \"retarget map\" "
+        "proposes. "
+        "What does not fit is listed; a pair that has such a target keeps it",
+        Preset, false, true},
     {"--min-score", "SCORE", "From here on, --auto takes no pair that scores less: from 0 to 1, at first 0.5",
         MinimumScore},
     {"--remove-target", "N", "Remove target N; those behind it move up by one", RemoveTarget},
@@ -335,19 +343,38 @@ std::string Trimmed(const std::string& i_rText)
 	return begin == std::string::npos ? "" : i_rText.substr(begin, i_rText.find_last_not_of(c_Blanks) + 1 - begin);
 }
 
-/// Thousands of edits for each segment that a subject may have; by mistake it is no text.
-constexpr std::size_t c_MaximumEditsBytes = 16u << 20;
+/// By its name, with dashes. Throws VCommandError with EBadInput if there is none.
+const VEditKind& FindKind(const std::string& i_rName, bool i_bOfCreate, const std::string& i_rWhere)
+{
+	const auto pKind = std::find_if(std::begin(c_Kinds), std::end(c_Kinds),
+	    [&](const VEditKind& i_rKind) { return i_rName == i_rKind.m_pName && (i_bOfCreate || !i_rKind.m_bOfCreate); });
+	if (pKind != std::end(c_Kinds))
+		return *pKind;
+	std::vector<std::string> names;
+	for (const VEditKind& rKind : c_Kinds)
+		names.push_back(rKind.m_pName);
+	throw VCommandError(EBadInput, i_rWhere + "there is no edit \"" + i_rName + "\"" + Meant(i_rName, names));
+}
+
+VEdit MakeEdit(const std::string& i_rName, const std::optional<std::string>& i_rValue, const std::string& i_rPath,
+    std::size_t i_Line, bool i_bOfCreate)
+{
+	const std::string where = i_rPath + ":" + std::to_string(i_Line) + ": ";
+	const VEditKind& rKind = FindKind(i_rName, i_bOfCreate, where);
+	if (i_rValue.has_value() == (rKind.m_pValue == nullptr))
+		throw VCommandError(EBadInput,
+		    where + i_rName + (i_rValue ? " takes no value" : std::string(" needs a value: ") + rKind.m_pValue));
+	VEdit edit{&rKind, i_rValue.value_or(""), where};
+	if (rKind.m_bFile)
+		edit.m_Value = PathBeside(i_rPath, edit.m_Value);
+	return edit;
+}
 
 /// One edit a line, as on the command line but without quotes: what stands behind the option's name is its value,
 /// blanks and all. Empty lines and those that begin with "#" are passed over.
-void ReadEdits(const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
+void ReadLines(const std::string& i_rText, const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
 {
-	std::string text;
-	std::string reason;
-	if (UtilsFileSystem::ReadWholeFile(InputPath(i_rPath, c_MaximumEditsBytes), c_MaximumEditsBytes, text, reason)
-	    != NVX::Status::c_Success)
-		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a file of edits: " + reason);
-	std::istringstream stream(std::move(text));
+	std::istringstream stream(i_rText);
 	std::size_t number = 0;
 	for (std::string line; std::getline(stream, line);)
 	{
@@ -355,24 +382,31 @@ void ReadEdits(const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
 		line = Trimmed(line);
 		if (line.empty() || line[0] == '#')
 			continue;
-		const std::string where = i_rPath + ":" + std::to_string(number) + ": ";
 		const std::size_t split = std::min(line.find_first_of(" \t="), line.size());
-		const std::string name = line.substr(0, split);
 		const std::string value = split == line.size() ? "" : Trimmed(line.substr(split + 1));
-		const auto pKind = std::find_if(std::begin(c_Kinds), std::end(c_Kinds),
-		    [&](const VEditKind& i_rKind) { return name == i_rKind.m_pName && (i_bOfCreate || !i_rKind.m_bOfCreate); });
-		if (pKind == std::end(c_Kinds))
-		{
-			std::vector<std::string> names;
-			for (const VEditKind& rKind : c_Kinds)
-				names.push_back(rKind.m_pName);
-			throw VCommandError(EBadInput, where + "there is no edit \"" + name + "\"" + Meant(name, names));
-		}
-		if (value.empty() == (pKind->m_pValue != nullptr))
-			throw VCommandError(EBadInput,
-			    where + name + (value.empty() ? std::string(" needs a value: ") + pKind->m_pValue : " takes no value"));
-		io_rEdits.push_back({pKind, value, where});
+		io_rEdits.push_back(MakeEdit(
+		    line.substr(0, split), value.empty() ? std::nullopt : std::optional(value), i_rPath, number, i_bOfCreate));
 	}
+}
+
+/// JSON, or lines of text.
+void ReadEdits(const std::string& i_rPath, bool i_bOfCreate, VEdits& io_rEdits)
+{
+	const std::string text = ReadSetupText(i_rPath, "a file of edits");
+	const std::size_t first = text.find_first_not_of(" \t\r\n");
+	if (first == std::string::npos || text[first] != '{')
+		return ReadLines(text, i_rPath, i_bOfCreate, io_rEdits);
+	const SetupIO::VSetup setup = ParseSetup(text, i_rPath, {"pairs", "edits"}, "a file of edits");
+	for (VEdit& rEdit : EditsOf(setup, i_rPath, i_bOfCreate))
+		io_rEdits.push_back(std::move(rEdit));
+}
+
+void AddPair(VSession& io_rSession, const SetupIO::VPair& i_rPair)
+{
+	const std::string what = "the pair of \"" + i_rPair.m_Source + "\" and \"" + i_rPair.m_Target + "\"";
+	const std::size_t source = FindElement(i_rPair.m_Source, SegmentsOf(io_rSession.Source(what), "source segment"));
+	const std::size_t target = FindElement(i_rPair.m_Target, SegmentsOf(io_rSession.Target(), "target segment"));
+	AddPairTargets(io_rSession, i_rPair, source, target);
 }
 
 /// What was told at loading and behind each edit of expressions that do not evaluate is forgotten for what is true of
@@ -386,6 +420,24 @@ void TellExpressionsAgain(const VRetargetSetupCore& i_rDocument)
 }
 
 } // namespace
+
+VEdits EditsOf(const SetupIO::VSetup& i_rSetup, const std::string& i_rPath, bool i_bOfCreate)
+{
+	VEdits edits;
+	for (const SetupIO::VPair& rPair : i_rSetup.m_Pairs)
+		edits.push_back({nullptr, {}, i_rPath + ":" + std::to_string(rPair.m_Line) + ": ", rPair});
+	for (const SetupIO::VEdit& rEdit : i_rSetup.m_Edits)
+		edits.push_back(MakeEdit("--" + rEdit.m_Name, rEdit.m_Value, i_rPath, rEdit.m_Line, i_bOfCreate));
+	return edits;
+}
+
+std::vector<SetupIO::VEditForm> EditForms()
+{
+	std::vector<SetupIO::VEditForm> forms;
+	for (const VEditKind& rKind : c_Kinds)
+		forms.push_back({std::string(rKind.m_pName).substr(2), rKind.m_pValue != nullptr, rKind.m_pHelp});
+	return forms;
+}
 
 void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits, bool i_bOfCreate)
 {
@@ -417,9 +469,9 @@ void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits,
 	    .add_option_function<std::string>(
 	        "--edits",
 	        [i_rpEdits, i_bOfCreate](const std::string& i_rPath) { ReadEdits(i_rPath, i_bOfCreate, *i_rpEdits); },
-	        "Here come the edits of a file: one a line, as --position Hips:Left Hip, without quotes; lines that begin "
-	        "with "
-	        "# are comments; - is standard input")
+	        "Here come the pairs and edits of a file in the form that \"retarget schema setup\" tells, or of one edit "
+	        "a "
+	        "line, as --position Hips:Left Hip, without quotes, where # begins comments; - is standard input")
 	    ->option_text("FILE")
 	    ->trigger_on_parse()
 	    ->group(c_pEditsGroup);
@@ -427,7 +479,12 @@ void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits,
 
 bool TakesProposal(const VEdits& i_rEdits)
 {
-	return std::ranges::any_of(i_rEdits, [](const VEdit& i_rEdit) { return i_rEdit.m_pKind->m_pApply == Auto; });
+	return std::ranges::any_of(i_rEdits,
+	    [](const VEdit& i_rEdit)
+	    {
+		    const auto* const pKind = i_rEdit.m_pKind;
+		    return pKind && (pKind->m_pApply == Auto || pKind->m_pApply == Preset);
+	    });
 }
 
 void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord)
@@ -447,7 +504,10 @@ void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
 	{
 		try
 		{
-			rEdit.m_pKind->m_pApply(io_rSession, rEdit.m_Value);
+			if (rEdit.m_pKind)
+				rEdit.m_pKind->m_pApply(io_rSession, rEdit.m_Value);
+			else
+				AddPair(io_rSession, rEdit.m_Pair);
 		}
 		catch (const VCommandError& rError)
 		{

@@ -3,8 +3,10 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
 #include "retarget/subject/Elements.h"
+#include "retarget/subject/SetupFile.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "RetargetSetupCore/Presets.h"
 #include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupCore/TargetConstruction.h"
 
@@ -80,6 +82,50 @@ void AddProposedTargets(VSession& io_rSession)
 	io_rSession.Document().AddTargets(targets);
 	NVX_LOG(c_pCategory, NVX::ELogInformation, "--auto: %1% pairs of segments, %2% segments of the source without one",
 	    rProposal.m_Pairs.size(), rProposal.m_UnmappedSources.size());
+}
+
+void AddPairTargets(VSession& io_rSession, const SetupIO::VPair& i_rPair, std::size_t i_Source, std::size_t i_Target)
+{
+	std::vector<RetargetSetup::VNewTarget> targets;
+	if (i_rPair.m_Position)
+		targets.push_back({i_Source, i_Target, true, *i_rPair.m_Position});
+	if (i_rPair.m_Rotation || !i_rPair.m_Position)
+		targets.push_back({i_Source, i_Target, false, i_rPair.m_Rotation.value_or(1.0)});
+	io_rSession.Document().AddTargets(targets);
+}
+
+void ApplyPreset(VSession& io_rSession, const std::string& i_rPath)
+{
+	const CoreOrlexTypes::VSubjectParametrised& rSource = io_rSession.Source("--preset");
+	const SetupIO::VSetup preset = ParseSetup(ReadSetupText(i_rPath, "a preset"), i_rPath, {"pairs"}, "a preset");
+	if (preset.m_Pairs.empty())
+		throw VCommandError(EBadInput, "\"" + i_rPath + "\" holds no pairs");
+	const VMapped mapped = ProposeForSubject(io_rSession);
+	const RetargetSetup::VPresetFit fit =
+	    RetargetSetup::FitPreset(preset.m_Pairs, rSource, io_rSession.Target(), &mapped.m_Proposal);
+	VJson proposed = VJson::array();
+	for (const RetargetSetup::VFittedPair& rPair : fit.m_Fitted)
+	{
+		AddPairTargets(io_rSession, rPair.m_Pair, rPair.m_Source, rPair.m_Target);
+		if (!rPair.m_bProposed)
+			continue;
+		const std::string& rSourceName = rSource.m_Segments[rPair.m_Source].m_Name;
+		const std::string& rTargetName = io_rSession.Target().m_Segments[rPair.m_Target].m_Name;
+		proposed.push_back({{"source", rPair.m_Pair.m_Source}, {"target", rPair.m_Pair.m_Target},
+		    {"foundSource", rSourceName}, {"foundTarget", rTargetName}});
+		io_rSession.m_ReportText += "Preset: \"" + Printable(rPair.m_Pair.m_Source) + "\" and \""
+		    + Printable(rPair.m_Pair.m_Target) + "\" became \"" + Printable(rSourceName) + "\" and \""
+		    + Printable(rTargetName) + "\", by proposal\n";
+	}
+	VJson missing = VJson::array();
+	for (const RetargetSetup::VMisfit& rMisfit : fit.m_Misfits)
+	{
+		missing.push_back(
+		    {{"source", rMisfit.m_Pair.m_Source}, {"target", rMisfit.m_Pair.m_Target}, {"reason", rMisfit.m_Reason}});
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "--preset: \"%1%\" and \"%2%\" were not tied: %3%",
+		    rMisfit.m_Pair.m_Source, rMisfit.m_Pair.m_Target, rMisfit.m_Reason);
+	}
+	io_rSession.m_ReportJson["preset"] = {{"pairs", fit.m_Fitted.size()}, {"proposed", proposed}, {"missing", missing}};
 }
 
 } // namespace CommandLine

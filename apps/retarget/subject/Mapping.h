@@ -2,6 +2,7 @@
 
 #include "retarget/subject/Session.h"
 
+#include "SetupIO/Setup.h"
 #include "SetupProposal/Proposal.h"
 
 #include <string>
@@ -33,5 +34,11 @@ VMapped ProposeForSubject(VSession& io_rSession);
 /// Adds the targets of all pairs that are proposed for the session's target subject, with their weights, and tells how
 /// many. EFindings if no pair scores enough.
 void AddProposedTargets(VSession& io_rSession);
+
+/// Adds the targets of a pair of segments, with their weights; a target that is there stays as it is.
+void AddPairTargets(VSession& io_rSession, const SetupIO::VPair& i_rPair, std::size_t i_Source, std::size_t i_Target);
+
+/// "--preset": adds the targets of its pairs, reports what was found by proposal and warns of what was not found.
+void ApplyPreset(VSession& io_rSession, const std::string& i_rPath);
 
 } // namespace CommandLine

@@ -125,13 +125,17 @@ void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std:
 	Settle();
 }
 
+std::size_t VSession::CountJoints() const
+{
+	return std::size_t(std::ranges::count_if(Target().m_Segments,
+	    [](const auto& i_rSegment)
+	    { return i_rSegment.m_Joint.m_JointType != CoreOrlexTypes::VSubjectParametrised::VJoint::EDummy; }));
+}
+
 void VSession::Report(const std::string& i_rPath) const
 {
 	const CoreOrlexTypes::VSubjectParametrised& rSubject = Target();
-	const auto joints = std::ranges::count_if(rSubject.m_Segments,
-	    [](const auto& i_rSegment)
-	    { return i_rSegment.m_Joint.m_JointType != CoreOrlexTypes::VSubjectParametrised::VJoint::EDummy; });
-	VJson json{{"output", i_rPath}, {"segments", rSubject.m_Segments.size()}, {"joints", joints},
+	VJson json{{"output", i_rPath}, {"segments", rSubject.m_Segments.size()}, {"joints", CountJoints()},
 	    {"targets", rSubject.m_Targets.size()}};
 	json.update(m_ReportJson);
 	PrintResult(json, i_rPath == c_pStandardStream ? "" : m_ReportText);

@@ -59,6 +59,9 @@ public:
 	const CoreOrlexTypes::VSubjectParametrised& Source(const std::string& i_rWhatFor) const;
 	const CoreOrlexTypes::VSubjectParametrised& Target() const;
 
+	/// Segments of the target subject that have a joint.
+	std::size_t CountJoints() const;
+
 	/// Gives all bind poses of the file, and forgets what was told of the pose before.
 	void MatchFilePose();
 

@@ -4,17 +4,14 @@
 #include "CommandLineText/Messages.h"
 #include "retarget/subject/Session.h"
 #include "retarget/text/InputFile.h"
-#include "retarget/text/Output.h"
+#include "retarget/text/OutputFile.h"
 
 #include "CoreOrlexQRTIO/Limits.h"
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexQRTIO/Writer.h"
 #include "DebugServices/GlobalLog.h"
-#include "NVX/Status.h"
 #include "RetargetSetupCore/FilePath.h"
 #include "RetargetSetupCore/Identity.h"
-#include "UtilsFileSystem/Paths.h"
-#include "UtilsFileSystem/SaveFile.h"
 
 #include <vector>
 
@@ -61,12 +58,7 @@ void WriteSubjectFile(const std::string& i_rPath, const CoreOrlexTypes::VSubject
 		NVX_LOG("QRTIO", NVX::ELogError, "%1%", rError);
 	if (!bWritten)
 		throw VCommandError(EBadOutput, "The subject could not be written");
-	RequireNoErrors();
-	if (i_rPath == c_pStandardStream)
-		return Print(text);
-	std::string reason;
-	if (UtilsFileSystem::SaveFile(UtilsFileSystem::PathFromUtf8(i_rPath), text, reason) != NVX::Status::c_Success)
-		throw VCommandError(EBadOutput, reason);
+	WriteText(text, i_rPath);
 }
 
 } // namespace CommandLine

@@ -230,6 +230,11 @@ VCandidates Versions(const VTyped&, const std::string&)
 	return Words(boost::algorithm::split(versions, texts, boost::algorithm::is_space()));
 }
 
+VCandidates PresetActions(const VTyped&, const std::string&)
+{
+	return Words({"save"});
+}
+
 /// By what a value is called in the help.
 struct VValue
 {
@@ -238,6 +243,7 @@ struct VValue
 };
 
 constexpr VValue c_Values[] = {
+    {"ACTION", PresetActions},
     {"BEFORE AFTER", Files},
     {"CATEGORY=LEVEL", CategoryAndLevel},
     {"DEG", Nothing},
@@ -264,10 +270,12 @@ constexpr VValue c_Values[] = {
     {"NAME=NUMBER", Nothing},
     {"NAME|INDEX", RootBone},
     {"OUT", Files},
+    {"OUT.json", Files},
     {"OUT.png", Files},
     {"OUT.qrr", Files},
     {"OUT.qrs", Files},
     {"OUT.svg", Files},
+    {"RECIPE.json", Files},
     {"S", Nothing},
     {"SCORE", Nothing},
     {"SEG=RX,RY,RZ[,TX,TY,TZ]", TargetSegment},

@@ -2,9 +2,12 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
+#include "retarget/text/Output.h"
 
+#include "NVX/Status.h"
 #include "RetargetSetupCore/FilePath.h"
 #include "UtilsFileSystem/Paths.h"
+#include "UtilsFileSystem/SaveFile.h"
 
 #include <boost/algorithm/string/case_conv.hpp>
 #include <boost/filesystem/operations.hpp>
@@ -64,6 +67,12 @@ bool BeginsDrawing(std::string_view i_Head)
 	return RootElement(i_Head) == "svg";
 }
 
+bool BeginsJson(std::string_view i_Head)
+{
+	i_Head.remove_prefix(std::min(i_Head.find_first_not_of(" \t\r\n"), i_Head.size()));
+	return i_Head.starts_with('{');
+}
+
 bool BeginsPicture(std::string_view i_Head)
 {
 	return i_Head.starts_with("\x89PNG\r\n\x1A\n");
@@ -96,6 +105,7 @@ const VOutputKind c_SkeletonFamilyFile{"a skeleton file", {".qrt", ".qrk", ".qrs
 const VOutputKind c_PerformerFile{"a performer's skeleton", {".qrs"}, BeginsSkeletonFile};
 const VOutputKind c_DrawingFile{"an SVG drawing", {".svg"}, BeginsDrawing};
 const VOutputKind c_SchemaFile{"an XML schema", {".xsd"}, BeginsSchema};
+const VOutputKind c_SetupFile{"a set-up in JSON", {".json"}, BeginsJson};
 const VOutputKind c_PictureFile{"a PNG picture", {".png"}, BeginsPicture};
 
 void AddForceOption(CLI::App& io_rApp, VOutput& io_rOutput)
@@ -130,6 +140,16 @@ void CheckOutput(const VOutput& i_rOutput, const VOutputKind& i_rKind, const std
 		throw VCommandError(EBadOutput,
 		    "\"" + rPath + "\" is there, and is not " + i_rKind.m_pName
 		        + ": give another name, or --force to replace it");
+}
+
+void WriteText(const std::string& i_rText, const std::string& i_rPath)
+{
+	RequireNoErrors();
+	if (i_rPath == "-")
+		return Print(i_rText);
+	std::string reason;
+	if (UtilsFileSystem::SaveFile(UtilsFileSystem::PathFromUtf8(i_rPath), i_rText, reason) != NVX::Status::c_Success)
+		throw VCommandError(EBadOutput, reason);
 }
 
 std::string LowerExtension(const std::string& i_rPath)

@@ -36,6 +36,8 @@ extern const VOutputKind c_PerformerFile;
 extern const VOutputKind c_DrawingFile;
 extern const VOutputKind c_SchemaFile;
 extern const VOutputKind c_PictureFile;
+/// Presets, recipes and their schema.
+extern const VOutputKind c_SetupFile;
 
 /// Adds --force.
 void AddForceOption(CLI::App& io_rApp, VOutput& io_rOutput);
@@ -45,6 +47,10 @@ void AddForceOption(CLI::App& io_rApp, VOutput& io_rOutput);
 /// there, unless that is forced. An empty file may always be replaced, and what is no regular file is left to the
 /// save to refuse.
 void CheckOutput(const VOutput& i_rOutput, const VOutputKind& i_rKind, const std::vector<std::string>& i_rInputs = {});
+
+/// Writes a text, to standard output if the path is "-". Throws VCommandError with EBadOutput if that fails, and where
+/// an error has been told or --strict forbids it; a file that stood there then stays.
+void WriteText(const std::string& i_rText, const std::string& i_rPath);
 
 /// The extension of a path in lower case, with the dot.
 std::string LowerExtension(const std::string& i_rPath);
