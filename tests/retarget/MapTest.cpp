@@ -291,6 +291,49 @@ TEST(Map, FindsThePairsWhateverTheNamesTheTreeAndTheFacing)
 	EXPECT_GE(all.Found(), 0.9);
 }
 
+/// A back that lies, with a head before and a tail behind it, on four legs: names in the order of the joints.
+VRestSkeleton Beast(const std::vector<std::string>& i_rNames)
+{
+	VRestSkeleton beast;
+	const auto add = [&](std::int64_t i_Parent, double i_X, double i_Y, double i_Z)
+	{
+		const std::string name =
+		    beast.size() < i_rNames.size() ? i_rNames[beast.size()] : "Bone" + std::to_string(beast.size());
+		beast.push_back({name, i_Parent, {i_X, i_Y, i_Z}, true});
+		return std::int64_t(beast.size()) - 1;
+	};
+	const std::int64_t hips = add(-1, 0.0, 500.0, 1000.0);
+	const std::int64_t chest = add(add(hips, 0.0, 150.0, 1020.0), 0.0, -400.0, 1000.0);
+	add(add(chest, 0.0, -650.0, 1250.0), 0.0, -800.0, 1450.0);
+	add(add(hips, 0.0, 700.0, 950.0), 0.0, 950.0, 700.0);
+	for (const auto& [parent, y] : {std::pair(hips, 480.0), std::pair(chest, -420.0)})
+		for (const double x : {150.0, -150.0})
+			add(add(add(add(parent, x, y, 900.0), x, y + 20.0, 500.0), x, y + 40.0, 120.0), x, y - 60.0, 20.0);
+	return beast;
+}
+
+TEST(Map, ProposesNothingForWhatIsNoBody)
+{
+	const VRestSkeleton performer = MapFiles(c_Rigs[0], c_Performers[0]).m_Source;
+	const std::vector<std::string> names{"Pelvis", "Spine", "Chest", "Neck", "Head", "Tail1", "Tail2", "LeftHindThigh",
+	    "LeftHindShin", "LeftHindFoot", "LeftHindToe", "RightHindThigh", "RightHindShin", "RightHindFoot",
+	    "RightHindToe", "LeftFrontThigh", "LeftFrontShin", "LeftFrontFoot", "LeftFrontToe", "RightFrontThigh",
+	    "RightFrontShin", "RightFrontFoot", "RightFrontToe"};
+	for (const VRestSkeleton& rBeast : {Beast({}), Beast(names)})
+	{
+		const VProposal proposal = SetupProposal::Propose(performer, rBeast);
+		EXPECT_TRUE(proposal.m_Pairs.empty());
+		EXPECT_FALSE(proposal.m_Alternatives.empty()) << "what is left to the operator";
+		EXPECT_NE(proposal.m_NoBody.find("stands on four legs"), std::string::npos) << proposal.m_NoBody;
+	}
+	RunRows({{"a prop", {"map", "--source", c_Performer, "--fbx", Data("fbx/ufbx_maya_transformed_skin_a6100.fbx")}, 0,
+	             "neither arms nor legs on both sides", ""},
+	    {"a prop is not tied",
+	        {"create", "--fbx", Data("fbx/ufbx_max_transformed_skin_zup_b6100.fbx"), "--source", c_Performer, "--auto",
+	            "-o", "x.qrr"},
+	        1, "", "--auto: nothing is proposed. The character's skeleton is not taken for a body"}});
+}
+
 TEST(Map, TellsWhatOfTheRestPoseDiffers)
 {
 	const VMapped demo = MapFiles(c_Rigs[0], c_Performers[1]);

@@ -62,6 +62,8 @@ VJson ToJson(const VMapped& i_rMapped)
 	    {"unmapped",
 	        {{"source", ToJson(rProposal.m_UnmappedSources, i_rMapped.m_Source)},
 	            {"target", ToJson(rProposal.m_UnmappedTargets, i_rMapped.m_Target)}}}};
+	if (!rProposal.m_NoBody.empty())
+		json["noBody"] = rProposal.m_NoBody;
 	if (i_rMapped.m_Root >= 0)
 		json["root"] = i_rMapped.m_Target[std::size_t(i_rMapped.m_Root)].m_Name;
 	return json;
@@ -110,7 +112,8 @@ std::string ListOf(const std::vector<SetupProposal::VUnmapped>& i_rUnmapped, con
 std::string ToText(const VMapped& i_rMapped)
 {
 	const SetupProposal::VProposal& rProposal = i_rMapped.m_Proposal;
-	std::string text = TableOf(rProposal.m_Pairs, i_rMapped);
+	std::string text = rProposal.m_NoBody.empty() ? TableOf(rProposal.m_Pairs, i_rMapped)
+	                                              : "Nothing is proposed. " + rProposal.m_NoBody + "\n";
 	if (!rProposal.m_Alternatives.empty())
 		text += "\nAlternatives\n" + TableOf(rProposal.m_Alternatives, i_rMapped);
 	text += "\nWithout a pair, of the source\n" + ListOf(rProposal.m_UnmappedSources, i_rMapped.m_Source);

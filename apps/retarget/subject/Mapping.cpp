@@ -66,6 +66,8 @@ void AddProposedTargets(VSession& io_rSession)
 {
 	const VMapped mapped = ProposeForSubject(io_rSession);
 	const auto& rProposal = mapped.m_Proposal;
+	if (!rProposal.m_NoBody.empty())
+		throw VCommandError(EFindings, "--auto: nothing is proposed. " + rProposal.m_NoBody);
 	if (rProposal.m_Pairs.empty())
 		throw VCommandError(EFindings,
 		    "--auto: no pair of segments scores enough; \"retarget map\" shows what there is, --min-score before "

@@ -196,4 +196,25 @@ std::vector<VPartLogs> VoteByLimbs(const VRestSkeleton& i_rSkeleton, const VBody
 	return votes;
 }
 
+std::vector<VLegs> LegsByShape(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame)
+{
+	const std::vector<std::int64_t> twins = FindTwins(i_rSkeleton);
+	const std::vector<std::int64_t> mainChildren = MainChildren(i_rSkeleton);
+	// What hangs on a twin is of its limb.
+	std::vector<bool> bLimb(i_rSkeleton.size());
+	std::vector<VLegs> legs;
+	for (std::size_t i = 0; i < i_rSkeleton.size(); ++i)
+	{
+		const std::int64_t parent = i_rSkeleton[i].m_Parent;
+		bLimb[i] = twins[i] >= 0 || (parent >= 0 && bLimb[std::size_t(parent)]);
+		if (twins[i] <= std::int64_t(i) || (parent >= 0 && bLimb[std::size_t(parent)]))
+			continue;
+		const auto twin = std::size_t(twins[i]);
+		if (LimbFrom(i_rSkeleton, i_rFrame, mainChildren, i).m_Region == ERegion::Leg
+		    && LimbFrom(i_rSkeleton, i_rFrame, mainChildren, twin).m_Region == ERegion::Leg)
+			legs.push_back({i, twin});
+	}
+	return legs;
+}
+
 } // namespace SetupProposal

@@ -10,4 +10,14 @@ namespace SetupProposal
 /// to the arms and on to the head. Nothing without twins.
 std::vector<VPartLogs> VoteByLimbs(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame);
 
+/// A joint and its twin, from which chains of bones reach the floor.
+struct VLegs
+{
+	std::size_t m_A = 0;
+	std::size_t m_B = 0;
+};
+
+/// All pairs of limbs that are legs by their shape, whatever their names: two in front of two others are a beast's.
+std::vector<VLegs> LegsByShape(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame);
+
 } // namespace SetupProposal

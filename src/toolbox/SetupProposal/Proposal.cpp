@@ -1,9 +1,11 @@
 #include "SetupProposal/Proposal.h"
 
 #include "SetupProposal/Assignment.h"
+#include "SetupProposal/BodyCheck.h"
 #include "SetupProposal/PairScore.h"
 
 #include <algorithm>
+#include <iterator>
 #include <map>
 
 namespace SetupProposal
@@ -94,6 +96,16 @@ std::string WhyUnmapped(const VJointReading& i_rJoint, const std::vector<VPropos
 	                : ": the other skeleton has none that is free");
 }
 
+std::string NoBody(const VRestSkeleton& i_rSource, const VBodyReading& i_rSourceBody, const VRestSkeleton& i_rTarget,
+    const VBodyReading& i_rTargetBody)
+{
+	if (const std::string why = WhyNoBody(i_rSource, i_rSourceBody); !why.empty())
+		return "The performer's skeleton is not taken for a body: " + why;
+	if (const std::string why = WhyNoBody(i_rTarget, i_rTargetBody); !why.empty())
+		return "The character's skeleton is not taken for a body: " + why;
+	return "";
+}
+
 } // namespace
 
 VProposal Propose(const VRestSkeleton& i_rSource, const VRestSkeleton& i_rTarget, double i_LeastScore)
@@ -133,7 +145,11 @@ VProposal Propose(const VRestSkeleton& i_rSource, const VRestSkeleton& i_rTarget
 			}
 	}
 	KeepBest(pairs, proposal.m_Alternatives);
-	proposal.m_Pairs = std::move(pairs);
+	proposal.m_NoBody = NoBody(source, proposal.m_Source, target, proposal.m_Target);
+	if (proposal.m_NoBody.empty())
+		proposal.m_Pairs = std::move(pairs);
+	else
+		std::ranges::move(pairs, std::back_inserter(proposal.m_Alternatives));
 	for (VProposedPair& rPair : proposal.m_Pairs)
 		for (const VProposedPair& rOther : proposal.m_Alternatives)
 			if ((rOther.m_Source == rPair.m_Source || rOther.m_Target == rPair.m_Target)

@@ -39,6 +39,9 @@ struct VProposal
 	/// Pairs that would do nearly as well as the one that one of the two stands in, or that are too poor to be
 	/// proposed.
 	std::vector<VProposedPair> m_Alternatives;
+	/// Why nothing is proposed, as a sentence: one of the two is no body. What pairs there would be stand with the
+	/// alternatives. Empty otherwise.
+	std::string m_NoBody;
 	std::vector<VUnmapped> m_UnmappedSources;
 	std::vector<VUnmapped> m_UnmappedTargets;
 	/// What each joint was taken for.
