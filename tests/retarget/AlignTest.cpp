@@ -43,6 +43,7 @@ TEST(Align, BringsEveryCharacterToThePoseOfThePerformer)
 			}
 			EXPECT_GT(before, 10.0);
 			EXPECT_TRUE(report.at("aligned").at("refused").empty());
+			EXPECT_EQ(report.at("pose")[4].at("fine"), true) << "told of what comes of all edits";
 			// Of the subject as it was saved.
 			const VJson map = RunJson({"map", "x.qrr", "--source", rSource, "--json", "-q"}, folder);
 			EXPECT_EQ(map.at("pose").size(), 6u);

@@ -167,7 +167,8 @@ TEST_F(Recipe, IsDescribedByASchemaThatNamesEveryEdit)
 	const VJson& rEdits = schema.at("properties").at("edits").at("items").at("properties");
 	EXPECT_EQ(rEdits.at("align").at("const"), true);
 	EXPECT_TRUE(rEdits.contains("match-file-pose"));
-	for (const auto& [rName, rValue] : VJson::parse(c_Recipe).items())
+	const VJson recipe = VJson::parse(c_Recipe);
+	for (const auto& [rName, rValue] : recipe.items())
 		EXPECT_TRUE(schema.at("properties").contains(rName)) << rName;
 }
 

@@ -117,9 +117,8 @@ void AlignTarget(VSession& io_rSession)
 	for (const auto& rChain : aligned->m_Alignment.m_Refused)
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "--align: the %1% stays as it is: %2%", rChain.m_Chain, rChain.m_Reason);
 	io_rSession.m_ReportJson["aligned"] = ToJson(aligned->m_Alignment, rSource, aligned->m_Subject);
-	const auto findings = PoseFindingsOf(io_rSession);
-	io_rSession.m_ReportJson["pose"] = PoseJson(findings);
-	io_rSession.m_ReportText += ToText(aligned->m_Alignment, rSource, aligned->m_Subject) + PoseText(findings);
+	io_rSession.m_ReportText += ToText(aligned->m_Alignment, rSource, aligned->m_Subject);
+	io_rSession.m_bAligned = true;
 }
 
 std::vector<SetupProposal::VPoseFinding> PoseFindingsOf(VSession& io_rSession)
@@ -129,6 +128,15 @@ std::vector<SetupProposal::VPoseFinding> PoseFindingsOf(VSession& io_rSession)
 	const auto sourceRest = RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject);
 	const auto targetRest = RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject);
 	return SetupProposal::CheckPose(sourceRest, targetRest, SetupProposal::Propose(sourceRest, targetRest));
+}
+
+void ReportPose(VSession& io_rSession)
+{
+	if (!io_rSession.m_bAligned)
+		return;
+	const auto findings = PoseFindingsOf(io_rSession);
+	io_rSession.m_ReportJson["pose"] = PoseJson(findings);
+	io_rSession.m_ReportText += PoseText(findings);
 }
 
 double ScaleThatFits(VSession& io_rSession)

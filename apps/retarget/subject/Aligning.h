@@ -21,6 +21,9 @@ void LockSegment(VSession& io_rSession, const std::string& i_rSegment);
 /// is a warning. A subject that stands as it was made takes the pose of its FBX file first.
 void AlignTarget(VSession& io_rSession);
 
+/// After all edits: how the two stand, into what the session reports, if it was aligned.
+void ReportPose(VSession& io_rSession);
+
 /// How source and target subject stand now.
 std::vector<SetupProposal::VPoseFinding> PoseFindingsOf(VSession& io_rSession);
 

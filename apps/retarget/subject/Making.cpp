@@ -1,6 +1,7 @@
 #include "retarget/subject/Making.h"
 
 #include "CommandLineText/Messages.h"
+#include "retarget/subject/Aligning.h"
 
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupCore/FilePose.h"
@@ -20,7 +21,8 @@ void MakeSubject(VSession& io_rSession, const VMaking& i_rMaking, const VEdits& 
 	{
 		io_rSession.LoadTarget(i_rMaking.m_Subject);
 		loadSource();
-		return ApplyEdits(io_rSession, i_rEdits);
+		ApplyEdits(io_rSession, i_rEdits);
+		return ReportPose(io_rSession);
 	}
 	// The target subject takes the source's name when it is made.
 	loadSource();
@@ -30,6 +32,7 @@ void MakeSubject(VSession& io_rSession, const VMaking& i_rMaking, const VEdits& 
 		    "The bind pose as built differs from the pose in the file, %1%; --match-file-pose mends it",
 		    RetargetSetup::WorstText(io_rSession.Target(), *worst));
 	ApplyEdits(io_rSession, i_rEdits);
+	ReportPose(io_rSession);
 	io_rSession.ForgetNamelessFiles();
 }
 

@@ -82,6 +82,7 @@ public:
 	bool m_bMatched = false;
 	/// What an alignment reaches.
 	RetargetSetup::VAlignmentChoice m_Alignment;
+	bool m_bAligned = false;
 	/// What edits add to the report.
 	VJson m_ReportJson = VJson::object();
 	std::string m_ReportText;
