@@ -449,6 +449,48 @@ TEST_F(Job, JudgesProposedTargets)
 	}
 }
 
+TEST_F(Job, AlignsToTheSourceWithAPreview)
+{
+	VOperator& rOperator = *m_pOperator;
+	CreateTargetSubject();
+	rOperator.ChooseInMenu("ToolsMenu", "ProposeTargets");
+	const auto press = [this](const char* i_pDialog, const char* i_pButton)
+	{
+		auto* const pDialog = m_pWindow->findChild<QWidget*>(i_pDialog);
+		ASSERT_TRUE(pDialog);
+		EXPECT_EVENTUALLY(pDialog->windowHandle() && pDialog->windowHandle()->isExposed());
+		const auto* const pButton = pDialog->findChild<QWidget*>(i_pButton);
+		QTest::mouseClick(
+		    pDialog->windowHandle(), Qt::LeftButton, {}, pButton->mapTo(pDialog, QPoint(10, pButton->height() / 2)));
+		QTest::qWait(0);
+	};
+	press("ProposeTargets", "ProposeAdd");
+	rOperator.Click("saveAs");
+	rOperator.AnswerDialog(File("before.qrr"));
+	EXPECT_EVENTUALLY(QFile::exists(File("before.qrr")) && !m_pWindow->isWindowModified());
+	const auto align = [&] { rOperator.ChooseInMenu("ToolsMenu", "AlignToSourceAction"); };
+	align();
+	EXPECT_TRUE(m_pWindow->isWindowModified()) << "the view shows it";
+	press("AlignToSource", "AlignArms");
+	press("AlignToSource", "AlignCancel");
+	EXPECT_EVENTUALLY(!m_pWindow->findChild<QWidget*>("AlignToSource"));
+	EXPECT_FALSE(m_pWindow->isWindowModified());
+	align();
+	press("AlignToSource", "AlignLegs");
+	press("AlignToSource", "AlignLegs");
+	press("AlignToSource", "AlignKeep");
+	EXPECT_EVENTUALLY(!m_pWindow->findChild<QWidget*>("AlignToSource"));
+	m_pWindow->activateWindow();
+	EXPECT_TRUE(QTest::qWaitForWindowActive(m_pWindow.get()));
+	rOperator.Click("saveAs");
+	rOperator.AnswerDialog(File("aligned.qrr"));
+	EXPECT_EVENTUALLY(QFile::exists(File("aligned.qrr")));
+	EXPECT_TRUE(Content("aligned.qrr")
+	    == CommandLine({"edit", File("before.qrr"), "--source", File("performer.qrs"), "--align"}));
+	EXPECT_EQ(rOperator.ChooseInMenu("EditMenu", "Undo"), "&Undo Align to Source");
+	EXPECT_EQ(rOperator.ChooseInMenu("EditMenu", "Undo"), "&Undo Propose Targets") << "one step";
+}
+
 TEST_F(Job, ALegacyFileIsSavedUnderANewName)
 {
 	VOperator& rOperator = *m_pOperator;

@@ -39,7 +39,7 @@ constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubje
     {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"},
     {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"MatchFilePose", "Take pose from FBX"},
     {"UpdateTargets", "Update targets"}, {"ProposeTargets", "Propose Targets"}, {"AddTargets", "Propose Targets"},
-    {"RestoreTargetSubjectURL", "Restore"}};
+    {"AlignToSource", "Align to Source"}, {"RestoreTargetSubjectURL", "Restore"}};
 
 /// By objectName, of what can be seen.
 QQuickItem* ItemNamed(QQuickItem& i_rItem, const QString& i_rName)
@@ -318,6 +318,27 @@ void VRetargetPanel::AddTargets(const QVariantList& i_rTargets)
 {
 	ApplyTyped();
 	QMetaObject::invokeMethod(m_pDocument, "AddTargets", Q_ARG(QVariantList, i_rTargets));
+}
+
+QVariantMap VRetargetPanel::AlignToSource(const QVariantList& i_rChains)
+{
+	ApplyTyped();
+	QVariantMap aligned;
+	QMetaObject::invokeMethod(m_pDocument, "AlignToSource", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, aligned),
+	    Q_ARG(QVariantList, i_rChains));
+	return aligned;
+}
+
+bool VRetargetPanel::IsAligning() const
+{
+	bool bAligning = false;
+	QMetaObject::invokeMethod(m_pDocument, "IsAligning", Qt::DirectConnection, Q_RETURN_ARG(bool, bAligning));
+	return bAligning;
+}
+
+void VRetargetPanel::EndAlignment(bool i_bKeep)
+{
+	QMetaObject::invokeMethod(m_pDocument, "EndAlignment", Q_ARG(bool, i_bKeep));
 }
 
 QStringList VRetargetPanel::SegmentsOf(const char* i_pModel) const

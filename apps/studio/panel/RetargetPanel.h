@@ -81,6 +81,10 @@ public:
 	QVariantMap ProposeTargets(double i_LeastScore);
 	/// In one step.
 	void AddTargets(const QVariantList& i_rTargets);
+	// The document's functions of these names.
+	QVariantMap AlignToSource(const QVariantList& i_rChains);
+	bool IsAligning() const;
+	void EndAlignment(bool i_bKeep);
 	/// By name.
 	QStringList SourceSegments() const { return SegmentsOf("SourceSegmentModel"); }
 	QStringList TargetSegments() const { return SegmentsOf("TargetSegmentModel"); }

@@ -9,6 +9,7 @@
 #include "studio/panel/FileKind.h"
 #include "studio/panel/RecentFiles.h"
 #include "studio/panel/RetargetPanel.h"
+#include "studio/window/AlignDialog.h"
 #include "studio/window/EditKeys.h"
 #include "studio/window/Named.h"
 #include "studio/window/PreferencesDialog.h"
@@ -148,7 +149,8 @@ void VStudioWindow::MakeEditMenu()
 		    m_pDispatcher->Post(
 		        [this]
 		        {
-			        if (m_pRetargetPanel)
+			        // The presses in a preview of a pose are none of their own.
+			        if (m_pRetargetPanel && !m_pRetargetPanel->IsAligning())
 				        m_pRetargetPanel->EndStep();
 		        });
 	    });
@@ -204,6 +206,7 @@ void VStudioWindow::MakeToolsMenu()
 	QMenu& rMenu = *Named(menuBar()->addMenu(tr("T&ools")), "ToolsMenu", tr("Tools"));
 	AddAction(rMenu, "ProposeTargets", tr("&Propose Targets..."), QKeySequence(QStringLiteral("Ctrl+P")),
 	    [this] { ShowProposal(); });
+	AddAction(rMenu, "AlignToSourceAction", tr("&Align to Source..."), {}, [this] { ShowAlignment(); });
 }
 
 void VStudioWindow::ShowProposal()
@@ -216,6 +219,22 @@ void VStudioWindow::ShowProposal()
 	// Why there is none is told.
 	if (m_pRetargetPanel && !m_pRetargetPanel->ProposeTargets(0.0).isEmpty())
 		(new VProposeDialog(*m_pRetargetPanel, m_pContext->GetSelectionManager()->Selection(), this))->show();
+}
+
+void VStudioWindow::ShowAlignment()
+{
+	if (auto* const pShown = findChild<QDialog*>(QStringLiteral("AlignToSource")))
+	{
+		pShown->raise();
+		return pShown->activateWindow();
+	}
+	if (!m_pRetargetPanel)
+		return;
+	auto* const pDialog = new VAlignDialog(*m_pRetargetPanel, this);
+	if (pDialog->Align())
+		return pDialog->show();
+	m_pRetargetPanel->EndAlignment(false);
+	delete pDialog;
 }
 
 void VStudioWindow::MakeHelpMenu()

@@ -145,7 +145,8 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 void VStudioWindow::UnloadModule()
 {
 	m_pWorkKeeper.reset();
-	delete findChild<QDialog*>(QStringLiteral("ProposeTargets"));
+	for (const char* const pDialog : {"ProposeTargets", "AlignToSource"})
+		delete findChild<QDialog*>(QLatin1String(pDialog));
 	m_pRetargetPanel.reset();
 	UpdateTitle();
 	m_pGui->PanelManager().Clear();

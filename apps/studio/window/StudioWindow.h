@@ -78,6 +78,7 @@ private:
 	QString AskWhereToSave();
 	void UpdateRecentFiles();
 	void ShowProposal();
+	void ShowAlignment();
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
 	void ShowOperatorPage();

@@ -57,6 +57,17 @@ public:
 	/// @param i_rTargets maps of "source", "target", "position" (else it is one of rotation) and "weight".
 	Q_INVOKABLE void AddTargets(const QVariantList& i_rTargets);
 
+	/// Brings the target subject to the pose of the source, beginning anew with the pose that stood there before the
+	/// first of several calls; all of them are one step.
+	/// @param i_rChains which are wanted: spine, arms, legs, others.
+	/// @return "joints", a list of maps: "target", "source", "before", "after" in degrees, "note"; "turn" in degrees,
+	/// "lift" in mm, "refused", a list of sentences. Empty if there is no change, which commandIgnored tells.
+	Q_INVOKABLE QVariantMap AlignToSource(const QVariantList& i_rChains);
+	/// What it has made is still there.
+	Q_INVOKABLE bool IsAligning() const;
+	/// @param i_bKeep false: the pose before it comes back, unless the target subject has become another one since.
+	Q_INVOKABLE void EndAlignment(bool i_bKeep);
+
 	// For a host that offers Undo and Redo.
 
 	Q_INVOKABLE void Undo() { VRetargetSetupCore::Undo(); }
@@ -121,6 +132,10 @@ private:
 	/// Empty, and the command is ignored, if the URL is not of a local file.
 	boost::filesystem::path LocalPath(const char* i_pCommand, const QUrl& i_rFileURL);
 
+	/// Before and after what AlignToSource has done; null without it.
+	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pBeforeAlignment;
+	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pAligned;
+	std::uint64_t m_Alignment = 0;
 	const std::shared_ptr<VRetargetSetupSegmentModel> m_pSourceSegmentModel;
 	const std::shared_ptr<VRetargetSetupSegmentModel> m_pTargetSegmentModel;
 	const std::shared_ptr<VRetargetSetupTargetModel> m_pTargetModel;

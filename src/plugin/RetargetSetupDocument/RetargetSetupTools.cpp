@@ -2,6 +2,7 @@
 
 #include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupCore/RetargetTargets.h"
+#include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
 #include "SetupProposal/PoseCheck.h"
 
@@ -72,4 +73,50 @@ void VRetargetSetup::AddTargets(const QVariantList& i_rTargets)
 		    map["position"].toBool(), map["weight"].toDouble()});
 	}
 	VRetargetSetupCore::AddTargets(targets);
+}
+
+bool VRetargetSetup::IsAligning() const
+{
+	return m_pAligned && TargetValues().m_pParametrised == m_pAligned;
+}
+
+QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains)
+{
+	if (IsAligning())
+		SetTargetSubjectParametrised(*m_pBeforeAlignment, {RetargetSetup::Steps::c_Align, m_Alignment});
+	else
+	{
+		VRetargetSetupCore::EndStep();
+		++m_Alignment;
+		m_pBeforeAlignment = TargetValues().m_pParametrised;
+	}
+	RetargetSetup::VAlignmentChoice choice;
+	choice.m_bSpine = i_rChains.value(0).toBool();
+	choice.m_bArms = i_rChains.value(1).toBool();
+	choice.m_bLegs = i_rChains.value(2).toBool();
+	choice.m_bOthers = i_rChains.value(3).toBool();
+	const auto alignment = VRetargetSetupCore::AlignToSource(choice, m_Alignment);
+	m_pAligned = TargetValues().m_pParametrised;
+	if (!alignment)
+		return {};
+	const VSubjectValues source = SourceValues();
+	QVariantList joints;
+	for (const SetupProposal::VAlignedJoint& rJoint : alignment->m_Joints)
+		joints << QVariantMap{{"target", QString::fromStdString(m_pAligned->m_Segments[rJoint.m_Target].m_Name)},
+		    {"source", QString::fromStdString(source.m_pParametrised->m_Segments[rJoint.m_Source].m_Name)},
+		    {"before", rJoint.m_Before}, {"after", rJoint.m_After}, {"note", QString::fromStdString(rJoint.m_Note)}};
+	QVariantList refused;
+	for (const SetupProposal::VRefusedChain& rChain : alignment->m_Refused)
+		refused << QString("The %1 stays as it is: %2")
+		               .arg(QString::fromStdString(rChain.m_Chain), QString::fromStdString(rChain.m_Reason));
+	return {
+	    {"joints", joints}, {"refused", refused}, {"turn", alignment->m_TurnDegrees}, {"lift", alignment->m_LiftMm}};
+}
+
+void VRetargetSetup::EndAlignment(bool i_bKeep)
+{
+	if (!i_bKeep && IsAligning())
+		SetTargetSubjectParametrised(*m_pBeforeAlignment, {RetargetSetup::Steps::c_Align, m_Alignment});
+	VRetargetSetupCore::EndStep();
+	m_pBeforeAlignment = m_pAligned = nullptr;
 }
