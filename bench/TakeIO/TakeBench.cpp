@@ -1,7 +1,14 @@
-// Takes: a BVH file from memory on, beside from_chars over its numbers alone; and the world poses of a frame.
+// Takes: a BVH file from memory on, beside from_chars over its numbers alone; an FBX file with a long stack, beside the
+// import of assimp without any post-processing; and the world poses of a frame.
 #include "../Ratios.h"
 
+#include "MotionIO/PrintMotion.h"
 #include "TakeIO/ReadTake.h"
+#include "UtilsFileSystem/Files.h"
+
+#include <assimp/Importer.hpp>
+#include <assimp/config.h>
+#include <assimp/scene.h>
 
 #include <charconv>
 #include <cmath>
@@ -64,6 +71,50 @@ void WorldPoses(benchmark::State& io_rState)
 		TakeIO::WorldPoses(take, frame = (frame + 1) % take.m_Frames, poses);
 }
 
+/// A character's file whose bones all turn in each of so many frames.
+std::string Fbx(std::int64_t i_Frames)
+{
+	MotionIO::VCharacterFile character{RETARGET_TEST_DATA "/fbx/own_game_zup_m_b7400.fbx", {}};
+	std::string error, bytes;
+	TakeIO::VTake take, longer;
+	UtilsFileSystem::ReadWholeFile(character.m_Path, 1 << 30, character.m_Bytes, error);
+	TakeIO::ReadTakeFrom(character.m_Bytes, {}, take, error);
+	longer = take;
+	longer.m_Values.clear();
+	longer.m_Frames = std::size_t(i_Frames);
+	for (std::size_t frame = 0; frame < longer.m_Frames; ++frame)
+		for (std::size_t i = 0; i < take.m_Channels; ++i)
+			longer.m_Values.push_back(
+			    take.Frame(0)[i] + (i % 6 < 3 ? 0.0 : 0.5 * std::sin(0.01 * double(frame * (i % 31 + 3)))));
+	MotionIO::PrintMotion(longer, MotionIO::EMotionForm::Fbx, &character, {"long", 1.0, {}}, bytes, error);
+	return bytes;
+}
+
+void ReadFbx(benchmark::State& io_rState)
+{
+	const std::string bytes = Fbx(io_rState.range(0));
+	TakeIO::VTake take;
+	std::string error;
+	for (auto _ : io_rState)
+		if (!TakeIO::ReadTakeFrom(bytes, {{}, {}, 24.0, "long"}, take, error))
+			io_rState.SkipWithError(error.c_str());
+}
+
+void AssimpImport(benchmark::State& io_rState)
+{
+	const std::string bytes = Fbx(io_rState.range(0));
+	Assimp::Importer importer;
+	importer.SetPropertyBool(AI_CONFIG_IMPORT_FBX_PRESERVE_PIVOTS, false);
+	for (auto _ : io_rState)
+	{
+		if (!importer.ReadFileFromMemory(bytes.data(), bytes.size(), 0, "fbx"))
+			io_rState.SkipWithError(importer.GetErrorString());
+		importer.FreeScene();
+	}
+}
+
+BENCHMARK(ReadFbx)->Arg(100)->Arg(2000);
+BENCHMARK(AssimpImport)->Arg(100)->Arg(2000);
 BENCHMARK(ReadBvh)->Arg(500)->Arg(5000);
 BENCHMARK(FromChars)->Arg(500)->Arg(5000);
 BENCHMARK(WorldPoses)->Arg(500);
@@ -72,5 +123,5 @@ BENCHMARK(WorldPoses)->Arg(500);
 
 int main(int i_Count, char** i_ppArguments)
 {
-	return Ratios::Main(i_Count, i_ppArguments, {{"ReadBvh", "FromChars", 1.5}});
+	return Ratios::Main(i_Count, i_ppArguments, {{"ReadBvh", "FromChars", 1.5}, {"ReadFbx", "AssimpImport", 1.0}});
 }
