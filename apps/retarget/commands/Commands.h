@@ -21,6 +21,7 @@ VCommand AddMapCommand(CLI::App& io_rProgram);
 VCommand AddTargetsCommand(CLI::App& io_rProgram);
 VCommand AddCheckCommand(CLI::App& io_rProgram);
 VCommand AddDiffCommand(CLI::App& io_rProgram);
+VCommand AddRebindCommand(CLI::App& io_rProgram);
 VCommand AddCreateCommand(CLI::App& io_rProgram);
 VCommand AddPresetCommand(CLI::App& io_rProgram);
 VCommand AddBuildCommand(CLI::App& io_rProgram);

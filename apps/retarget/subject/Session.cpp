@@ -41,7 +41,9 @@ void ForgetPoseWarnings()
 	    });
 }
 
-std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_rSkeleton)
+} // namespace
+
+std::size_t FindRootBone(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_rSkeleton)
 {
 	VElements bones{"bone", {}};
 	for (const FBXIO::VSkinBone& rBone : i_rSkeleton)
@@ -57,8 +59,6 @@ std::size_t FindRoot(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_r
 		rName = RetargetSetup::StripNamespace(rName);
 	return FindElement(i_rWord, bones);
 }
-
-} // namespace
 
 VSession::VSession()
     : m_pApplication(std::make_shared<InMemoryHost::VApplication>()),
@@ -115,7 +115,7 @@ void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std:
 	const auto pSkeleton = m_pDocument->GetFBXSkeleton();
 	m_Root = 0;
 	if (i_rRoot)
-		m_Root = FindRoot(*i_rRoot, *pSkeleton);
+		m_Root = FindRootBone(*i_rRoot, *pSkeleton);
 	else if (const std::int64_t root = i_bBodyRoot ? ProposeForFile(*this).m_Root : -1; root >= 0)
 		m_Root = std::size_t(root);
 	if (i_rRoot || *m_Root != 0)

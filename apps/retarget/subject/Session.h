@@ -96,6 +96,9 @@ private:
 	bool m_bTargetNamed = true;
 };
 
+/// The bone of this name, with its namespace or without, or of this index. EWrongUsage if the file does not have it.
+std::size_t FindRootBone(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_rSkeleton);
+
 /// World poses of all segments of a subject in its bind pose, in mm; empty, which is told, if it has no
 /// kinematics.
 std::vector<Rotation::VPose<double>> BindPosesOf(

@@ -116,6 +116,7 @@ private:
 	void CompareElements(const std::vector<T>& i_rBefore, const std::vector<T>& i_rAfter, const VPlace& i_rPlace)
 	{
 		constexpr const char* c_pElement = ElementName<T>();
+		constexpr bool c_bBeside = c_bBesideSubject<T>;
 		const std::vector<std::string> before = ElementNames(m_Before, i_rBefore);
 		const std::vector<std::string> after = ElementNames(m_After, i_rAfter);
 		std::map<std::string_view, std::size_t> places;
@@ -135,14 +136,14 @@ private:
 		const auto tellWhole = [&](const T& i_rElement, const std::string& i_rName, const char* i_pWhat)
 		{
 			// What is drawn of an element, and an extra that holds nothing, come and go with the element.
-			if constexpr (c_bBesideSubject<T>)
-			{
-				if (Stands(m_Before, i_rName, c_pElement) == Stands(m_After, i_rName, c_pElement))
-					Tell(placeOf(i_rName), std::string(c_pElement) + "-" + i_pWhat,
-					    std::string("what is drawn of it was ") + i_pWhat);
-			}
-			else if (!i_rPlace.m_Field.starts_with("Extras") || HoldsMoreThanName(i_rElement))
-				Tell(placeOf(i_rName), std::string(c_pElement) + "-" + i_pWhat, i_pWhat);
+			const bool bExtra = i_rPlace.m_Field.starts_with("Extras");
+			if (c_bBeside ? Stands(m_Before, i_rName, c_pElement) != Stands(m_After, i_rName, c_pElement)
+			              : bExtra && !HoldsMoreThanName(i_rElement))
+				return;
+			const std::string begin = c_bBeside ? "what is drawn of it was "
+			    : bExtra                        ? "what only the file holds of it was "
+			                                    : "";
+			Tell(placeOf(i_rName), std::string(c_pElement) + "-" + i_pWhat, begin + i_pWhat);
 		};
 		std::vector<bool> found(after.size());
 		std::size_t last = 0;
@@ -166,7 +167,7 @@ private:
 		for (std::size_t i = 0; i < after.size(); ++i)
 			if (!found[i])
 				tellWhole(i_rAfter[i], after[i], "added");
-		if (!bOrder && !c_bBesideSubject<T>)
+		if (!bOrder && !c_bBeside)
 			Tell({.m_Field = i_rPlace.m_Field}, "order",
 			    "the " + std::string(c_pElement) + "s stand in another order"
 			        + (bNested ? " in " + i_rPlace.m_Name : ""));
