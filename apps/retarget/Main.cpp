@@ -4,6 +4,7 @@
 int main(int i_Count, char** i_ppArguments)
 {
 	const std::vector<std::string> arguments(i_ppArguments + 1, i_ppArguments + i_Count);
-	return CommandLine::Run(
-	    arguments, [&](const CommandLine::VRenderSettings&) { return CommandLine::RunRenderer(arguments); });
+	return CommandLine::Run(arguments,
+	    {[&](const CommandLine::VRenderSettings&) { return CommandLine::RunRenderer(arguments); },
+	        CommandLine::RenderedPicture});
 }

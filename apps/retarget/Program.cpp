@@ -123,13 +123,14 @@ VProgram MakeProgram(const VRender& i_rRender)
 	rApp.require_subcommand(0, 1);
 	rApp.allow_extras();
 	const auto addRender = [&](CLI::App& io_rProgram) { return AddRenderCommand(io_rProgram, i_rRender); };
+	const auto addReport = [&](CLI::App& io_rProgram) { return AddReportCommand(io_rProgram, i_rRender); };
 	using VAdd = std::function<VCommand(CLI::App&)>;
 	for (const VAdd& rAdd : {VAdd(AddCreateCommand), VAdd(AddEditCommand), VAdd(AddRebindCommand),
 	         VAdd(AddBuildCommand), VAdd(AddPresetCommand), VAdd(AddMapCommand), VAdd(AddTargetsCommand),
-	         VAdd(AddCheckCommand), VAdd(AddDiffCommand), VAdd(AddBonesCommand), VAdd(AddSegmentsCommand),
-	         VAdd(addRender), VAdd(AddSolveCommand), VAdd(AddFbxCommand), VAdd(AddTakeCommand),
-	         VAdd(AddPerformerCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand), VAdd(AddConvertCommand),
-	         VAdd(AddSchemaCommand), VAdd(AddEvalCommand), VAdd(AddDocumentationCommand)})
+	         VAdd(AddCheckCommand), VAdd(AddAdviseCommand), VAdd(AddDiffCommand), VAdd(AddBonesCommand),
+	         VAdd(AddSegmentsCommand), VAdd(addRender), VAdd(addReport), VAdd(AddSolveCommand), VAdd(AddFbxCommand),
+	         VAdd(AddTakeCommand), VAdd(AddPerformerCommand), VAdd(AddDumpCommand), VAdd(AddFkCommand),
+	         VAdd(AddConvertCommand), VAdd(AddSchemaCommand), VAdd(AddEvalCommand), VAdd(AddDocumentationCommand)})
 		program.m_Commands.push_back(rAdd(rApp));
 	std::vector<CLI::App*> apps{&rApp};
 	for (const VCommand& rCommand : program.m_Commands)

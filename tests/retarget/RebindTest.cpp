@@ -70,8 +70,8 @@ TEST_F(Rebind, LongerLegsAndAnotherName)
 	ASSERT_EQ(
 	    m_Folder.Run({"-q", "edit", "new.qrr", "--source", c_Performer, "--update-targets", "-o", "m.qrr"}).m_Status,
 	    0);
-	for (const VJson& rChange :
-	    VJson::parse(m_Folder.Run({"-q", "diff", "new.qrr", "m.qrr", "--json"}).m_Out)["changes"])
+	const VJson measured = VJson::parse(m_Folder.Run({"-q", "diff", "new.qrr", "m.qrr", "--json"}).m_Out);
+	for (const VJson& rChange : measured["changes"])
 		EXPECT_LT(rChange.value("millimetres", 0.0) + rChange.value("degrees", 0.0), 1e-3) << rChange;
 }
 

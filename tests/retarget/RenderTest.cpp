@@ -129,6 +129,25 @@ TEST(Render, DrawsWhatThePreviewShows)
 	EXPECT_EQ(shared.m_Err.find("other control points"), std::string::npos) << shared.m_Err;
 }
 
+TEST(Render, PicturesOfAReport)
+{
+	const VSubjectFolder folder;
+	const auto pictures = [&](std::vector<std::string> i_Options)
+	{
+		i_Options.insert(i_Options.begin(), {"-q", "report", "x.qrr", "--source", c_Performer, "-o", "-"});
+		const std::string page = folder.Run(i_Options).m_Out;
+		const std::string begin = "src=\"data:image/png;base64,iVBORw0KGgo";
+		int count = 0;
+		for (std::size_t at = page.find(begin); at != std::string::npos; at = page.find(begin, at + 1))
+			++count;
+		EXPECT_EQ(folder.Run(i_Options).m_Out, page);
+		return count;
+	};
+	EXPECT_EQ(pictures({}), 2);
+	EXPECT_EQ(pictures({"--fbx", c_Fbx}), 4);
+	EXPECT_EQ(pictures({"--no-pictures"}), 0);
+}
+
 TEST(Render, TellsWhatItLacks)
 {
 	const VSubjectFolder folder;

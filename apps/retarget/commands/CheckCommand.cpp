@@ -1,10 +1,10 @@
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
 #include "retarget/commands/Commands.h"
+#include "retarget/subject/Findings.h"
 #include "retarget/subject/SubjectFile.h"
 #include "retarget/text/Output.h"
 
-#include "CoreOrlexTypesUtils/check/SubjectCheck.h"
 #include "DebugServices/GlobalLog.h"
 
 namespace CommandLine
@@ -13,7 +13,6 @@ namespace
 {
 
 using CoreOrlexTypesUtils::VSubjectFinding;
-using VFindings = std::vector<VSubjectFinding>;
 
 struct VChecked
 {
@@ -21,29 +20,6 @@ struct VChecked
 	bool m_bReadable = false;
 	VFindings m_Findings;
 };
-
-/// With the names of targets, which stand in the application data.
-VFindings FindingsOf(const CoreOrlexTypes::VSubjectRecord& i_rRecord)
-{
-	VFindings findings = CoreOrlexTypesUtils::FindSubjectFaults(i_rRecord.m_SubjectParametrised);
-	const auto& rTargets = i_rRecord.m_SubjectApplicationData.m_Targets;
-	for (VSubjectFinding& rFinding : findings)
-		if (rFinding.m_Element == VSubjectFinding::ETarget && rFinding.m_Index < rTargets.size())
-			rFinding.m_Name = rTargets[rFinding.m_Index].m_Name;
-	return findings;
-}
-
-const char* KindOf(VSubjectFinding::EElement i_Element)
-{
-	switch (i_Element)
-	{
-	case VSubjectFinding::EStaticParameter: return "static parameter";
-	case VSubjectFinding::EMarker: return "marker";
-	case VSubjectFinding::ESegment: return "segment";
-	case VSubjectFinding::ETarget: return "target";
-	}
-	return "";
-}
 
 /// One list for all files, as scripts know it of one.
 VJson ToJson(const std::vector<VChecked>& i_rFiles)

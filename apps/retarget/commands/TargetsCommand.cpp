@@ -4,14 +4,12 @@
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Residuals.h"
 #include "retarget/subject/Session.h"
+#include "retarget/subject/TargetLines.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/Table.h"
 
-#include "CoreOrlexTypes/Fields.h"
 #include "DebugServices/GlobalLog.h"
-#include "RetargetSetupCore/RetargetTargets.h"
 
-#include <numbers>
 #include <unistd.h>
 
 namespace CommandLine
@@ -26,37 +24,11 @@ struct VTargetsSettings
 	bool m_bStates = false;
 };
 
-/// What is shown of one target; empty texts for what it does not have.
-struct VTargetLine
-{
-	std::string m_Name;
-	std::string m_Type;
-	std::string m_Source;
-	std::string m_Target;
-	double m_Weight = 0.0;
-	std::vector<std::string> m_State;
-	VTargetResidual m_Residual;
-};
-
-double Degrees(double i_Radians)
-{
-	return i_Radians * 180.0 / std::numbers::pi;
-}
-
-std::string ResidualText(const VResidual& i_rResidual)
-{
-	if (i_rResidual.m_Distance)
-		return Fixed(*i_rResidual.m_Distance, 3) + " mm";
-	if (i_rResidual.m_Angle)
-		return Fixed(Degrees(*i_rResidual.m_Angle), 3) + " deg";
-	return "-";
-}
-
 VJson ResidualToJson(const VResidual& i_rResidual)
 {
 	if (i_rResidual.m_Distance)
 		return *i_rResidual.m_Distance;
-	return i_rResidual.m_Angle ? VJson(Degrees(*i_rResidual.m_Angle)) : VJson();
+	return i_rResidual.m_Angle ? VJson(AsDegrees(*i_rResidual.m_Angle)) : VJson();
 }
 
 /// A solver goes by the targets' own kinematics, the editing tools store offsets from the segments' poses.
@@ -72,32 +44,6 @@ void TellDisagreement(const std::vector<VTargetLine>& i_rLines)
 		    "the target's kinematics; post poses of segments and orientations of rotation targets do this",
 		    *worst, i_rLines[*worst].m_Name, ResidualText(residuals[*worst].m_Offset),
 		    ResidualText(residuals[*worst].m_Target));
-}
-
-std::vector<VTargetLine> Lines(VSession& io_rSession, bool i_bResiduals)
-{
-	const VRetargetSetupCore::VSubjectValues target = io_rSession.Document().TargetValues();
-	const auto& rSubject = *target.m_pParametrised;
-	std::vector<VTargetLine> lines(rSubject.m_Targets.size());
-	std::vector<VTargetResidual> residuals(lines.size());
-	if (i_bResiduals)
-		residuals = Residuals(io_rSession.Document().SourceValues(), target);
-	for (std::size_t i = 0; i < lines.size(); ++i)
-	{
-		const auto& rTarget = rSubject.m_Targets[i];
-		VTargetLine& rLine = lines[i];
-		if (i < target.m_pApplicationData->m_Targets.size())
-			rLine.m_Name = target.m_pApplicationData->m_Targets[i].m_Name;
-		rLine.m_Type = CoreOrlexTypes::EnumeratorName(rTarget.m_Type);
-		for (const std::string& rName : FollowedNames(rSubject, rTarget))
-			rLine.m_Source += (rLine.m_Source.empty() ? "" : ", ") + rName;
-		if (const std::string* pName = RetargetSetup::TargetSegmentName(rSubject, rTarget))
-			rLine.m_Target = *pName;
-		rLine.m_Weight = rTarget.m_Weight;
-		rLine.m_State = rTarget.m_StateExpressions;
-		rLine.m_Residual = residuals[i];
-	}
-	return lines;
 }
 
 VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
@@ -123,14 +69,6 @@ VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
 		list.push_back(std::move(item));
 	}
 	return list;
-}
-
-/// "Point" for "LocalPointToWorldPoint": what the type has in the target segment.
-std::string ShortType(std::string i_Type)
-{
-	if (i_Type.starts_with("Local"))
-		i_Type.erase(0, 5);
-	return i_Type.substr(0, i_Type.find("To"));
 }
 
 VTable LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals, bool i_bStates)
@@ -175,7 +113,7 @@ EExitStatus ShowTargets(const VTargetsSettings& i_rSettings)
 	const bool bResiduals = !i_rSettings.m_Source.empty();
 	if (bResiduals)
 		session.LoadSource(i_rSettings.m_Source);
-	const std::vector<VTargetLine> lines = Lines(session, bResiduals);
+	const std::vector<VTargetLine> lines = TargetLines(session, bResiduals);
 	TellDisagreement(lines);
 	VTable table = LinesToTable(lines, bResiduals, true);
 	if (!i_rSettings.m_bStates && table.LineWidth() > TerminalWidth())

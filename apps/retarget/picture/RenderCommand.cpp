@@ -36,7 +36,7 @@ EExitStatus Render(const VRenderSettings& i_rSettings, const VRender& i_rRender)
 	boost::system::error_code error;
 	if (!i_rSettings.m_Skins.empty() && !boost::filesystem::is_directory(i_rSettings.m_Skins, error))
 		throw VCommandError(EBadInput, "There is no folder \"" + i_rSettings.m_Skins + "\" to look for skins in");
-	return i_rRender(i_rSettings);
+	return i_rRender.m_Command(i_rSettings);
 }
 
 } // namespace

@@ -30,6 +30,12 @@ inline constexpr std::array c_Views = {"perspective", "front", "back", "left", "
 
 /// Draws the picture. Only this needs a display, and libraries that would make every start of the program longer: so
 /// "retarget" has another program do it, which is made of the same commands.
-using VRender = std::function<EExitStatus(const VRenderSettings&)>;
+struct VRender
+{
+	/// The command "render", as its line was given.
+	std::function<EExitStatus(const VRenderSettings&)> m_Command;
+	/// The bytes of a picture for another command. Throws VCommandError with the reason where none can be drawn.
+	std::function<std::string(const VRenderSettings&)> m_Picture;
+};
 
 } // namespace CommandLine

@@ -270,6 +270,7 @@ constexpr VValue c_Values[] = {
     {"NAME=NUMBER", Nothing},
     {"NAME|INDEX", RootBone},
     {"OUT", Files},
+    {"OUT.html", Files},
     {"OUT.json", Files},
     {"OUT.png", Files},
     {"OUT.qrr", Files},

@@ -78,6 +78,11 @@ bool BeginsPicture(std::string_view i_Head)
 	return i_Head.starts_with("\x89PNG\r\n\x1A\n");
 }
 
+bool BeginsPage(std::string_view i_Head)
+{
+	return i_Head.starts_with("<!DOCTYPE html>");
+}
+
 /// False if the file cannot be read.
 bool ReadHead(const boost::filesystem::path& i_rPath, std::string& o_rHead)
 {
@@ -107,6 +112,7 @@ const VOutputKind c_DrawingFile{"an SVG drawing", {".svg"}, BeginsDrawing};
 const VOutputKind c_SchemaFile{"an XML schema", {".xsd"}, BeginsSchema};
 const VOutputKind c_SetupFile{"a set-up in JSON", {".json"}, BeginsJson};
 const VOutputKind c_PictureFile{"a PNG picture", {".png"}, BeginsPicture};
+const VOutputKind c_PageFile{"an HTML page", {".html", ".htm"}, BeginsPage};
 
 void AddForceOption(CLI::App& io_rApp, VOutput& io_rOutput)
 {

@@ -38,6 +38,7 @@ extern const VOutputKind c_SchemaFile;
 extern const VOutputKind c_PictureFile;
 /// Presets, recipes and their schema.
 extern const VOutputKind c_SetupFile;
+extern const VOutputKind c_PageFile;
 
 /// Adds --force.
 void AddForceOption(CLI::App& io_rApp, VOutput& io_rOutput);

@@ -35,6 +35,8 @@ void BakeBindPose(VSubjectParametrised::VSegment& io_rSegment)
 		io_rSegment.m_PreRotation[i] = NumberText::PrintF(baked[i]);
 }
 
+} // namespace
+
 std::vector<bool> SegmentsWithTargets(const VSubjectParametrised& i_rSubject)
 {
 	std::vector<bool> used(i_rSubject.m_Segments.size());
@@ -44,7 +46,12 @@ std::vector<bool> SegmentsWithTargets(const VSubjectParametrised& i_rSubject)
 	return used;
 }
 
-} // namespace
+void RemoveJoint(VSubjectParametrised::VSegment& io_rSegment)
+{
+	if (io_rSegment.m_Joint.m_JointType == VJoint::EBall)
+		BakeBindPose(io_rSegment);
+	io_rSegment.m_Joint = VJoint();
+}
 
 void DefaultCovariance(VJoint& io_rJoint)
 {
@@ -79,11 +86,8 @@ void RemoveJointsWithoutTargets(VSubjectParametrised& io_rSubject, CoreOrlexQRTI
 	for (std::size_t i = 1; i < io_rSubject.m_Segments.size(); ++i)
 	{
 		VSubjectParametrised::VSegment& rSegment = io_rSubject.m_Segments[i];
-		if (used[i] || rSegment.m_Joint.m_JointType == VJoint::EDummy)
-			continue;
-		if (rSegment.m_Joint.m_JointType == VJoint::EBall)
-			BakeBindPose(rSegment);
-		rSegment.m_Joint = VJoint();
+		if (!used[i] && rSegment.m_Joint.m_JointType != VJoint::EDummy)
+			RemoveJoint(rSegment);
 	}
 	shares.Restore(io_rSubject, io_rExtras);
 }

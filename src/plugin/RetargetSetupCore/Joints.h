@@ -4,6 +4,8 @@
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "numerics/Rotation.h"
 
+#include <vector>
+
 namespace RetargetSetup
 {
 
@@ -19,9 +21,15 @@ void EnableJoint(CoreOrlexTypes::VSubjectParametrised& io_rSubject, std::size_t 
 /// @param io_rExtras of the file that the subject comes from: T-pose constraints stay in step with the joints.
 void EnableAllJoints(CoreOrlexTypes::VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras);
 
+/// Takes the joint from a segment. The bind pose of a Ball joint goes into the segment's pre-rotation, as bind pose
+/// times pre-rotation: this keeps the world pose only where one of the two is zero. Joints of other types lose theirs.
+void RemoveJoint(CoreOrlexTypes::VSubjectParametrised::VSegment& io_rSegment);
+
+/// For each segment whether it carries a target of its own.
+std::vector<bool> SegmentsWithTargets(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
+
 /// Takes the joint from every segment, the root aside, that carries no target of its own; targets of its children do
-/// not count. The bind pose of a Ball joint goes into the segment's pre-rotation, as bind pose times pre-rotation: this
-/// keeps the world pose only where one of the two is zero. Joints of other types lose theirs.
+/// not count.
 /// @param io_rExtras as above.
 void RemoveJointsWithoutTargets(
     CoreOrlexTypes::VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras);

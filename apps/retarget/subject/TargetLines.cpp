@@ -1,0 +1,60 @@
+#include "retarget/subject/TargetLines.h"
+
+#include "retarget/text/Table.h"
+
+#include "CoreOrlexTypes/Fields.h"
+#include "RetargetSetupCore/RetargetTargets.h"
+
+#include <numbers>
+
+namespace CommandLine
+{
+
+double AsDegrees(double i_Radians)
+{
+	return i_Radians * 180.0 / std::numbers::pi;
+}
+
+std::string ResidualText(const VResidual& i_rResidual)
+{
+	if (i_rResidual.m_Distance)
+		return Fixed(*i_rResidual.m_Distance, 3) + " mm";
+	if (i_rResidual.m_Angle)
+		return Fixed(AsDegrees(*i_rResidual.m_Angle), 3) + " deg";
+	return "-";
+}
+
+std::vector<VTargetLine> TargetLines(VSession& io_rSession, bool i_bResiduals)
+{
+	const VRetargetSetupCore::VSubjectValues target = io_rSession.Document().TargetValues();
+	const auto& rSubject = *target.m_pParametrised;
+	std::vector<VTargetLine> lines(rSubject.m_Targets.size());
+	std::vector<VTargetResidual> residuals(lines.size());
+	if (i_bResiduals)
+		residuals = Residuals(io_rSession.Document().SourceValues(), target);
+	for (std::size_t i = 0; i < lines.size(); ++i)
+	{
+		const auto& rTarget = rSubject.m_Targets[i];
+		VTargetLine& rLine = lines[i];
+		if (i < target.m_pApplicationData->m_Targets.size())
+			rLine.m_Name = target.m_pApplicationData->m_Targets[i].m_Name;
+		rLine.m_Type = CoreOrlexTypes::EnumeratorName(rTarget.m_Type);
+		for (const std::string& rName : FollowedNames(rSubject, rTarget))
+			rLine.m_Source += (rLine.m_Source.empty() ? "" : ", ") + rName;
+		if (const std::string* pName = RetargetSetup::TargetSegmentName(rSubject, rTarget))
+			rLine.m_Target = *pName;
+		rLine.m_Weight = rTarget.m_Weight;
+		rLine.m_State = rTarget.m_StateExpressions;
+		rLine.m_Residual = residuals[i];
+	}
+	return lines;
+}
+
+std::string ShortType(std::string i_Type)
+{
+	if (i_Type.starts_with("Local"))
+		i_Type.erase(0, 5);
+	return i_Type.substr(0, i_Type.find("To"));
+}
+
+} // namespace CommandLine

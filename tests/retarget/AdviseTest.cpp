@@ -1,0 +1,78 @@
+#include "Rows.h"
+
+namespace
+{
+
+class Advise : public testing::Test
+{
+protected:
+	void Create(std::vector<std::string> i_Edits)
+	{
+		i_Edits.insert(i_Edits.begin(), {"-q", "create", "--fbx", c_Fbx, "--source", c_Performer, "-o", "x.qrr"});
+		const VRun run = m_Folder.Run(i_Edits);
+		ASSERT_EQ(run.m_Status, 0) << run.m_Err;
+	}
+
+	VJson Advice(std::vector<std::string> i_Options)
+	{
+		i_Options.insert(i_Options.begin(), {"-q", "advise", "x.qrr", "--json"});
+		return RunJson(i_Options, m_Folder);
+	}
+
+	VJson Joint(const std::vector<std::string>& i_rOptions, const std::string& i_rName)
+	{
+		const VJson advice = Advice(i_rOptions);
+		for (const VJson& rJoint : advice["prune"])
+			if (rJoint["segment"] == i_rName)
+				return rJoint;
+		return {{"verdict", "not there"}};
+	}
+
+	const VScratchFolder m_Folder;
+};
+
+TEST_F(Advise, JointsThatCouldGo)
+{
+	Create({"--rotation", "Hips:Hips", "--position", "LeftHand:LeftHand", "--pose", "LeftForeArm=0,0,0.5"});
+	EXPECT_EQ(Joint({}, "LeftForeArm")["verdict"], "may go");
+	const VJson stay = Joint({"--fbx", c_Fbx}, "LeftForeArm");
+	EXPECT_EQ(stay["verdict"], "stay");
+	EXPECT_GT(stay["vertices"].get<int>(), 100);
+	EXPECT_EQ(stay["targetsBelow"], VJson({1}));
+	EXPECT_EQ(Joint({}, "RightLeg")["verdict"], "go");
+	for (const char* const pKept : {"Hips", "LeftHand"})
+		EXPECT_EQ(Joint({}, pKept)["verdict"], "not there") << pKept;
+	// As pruning all joints but those does: the hand stays where it is told to go.
+	ASSERT_EQ(m_Folder.Run({"-q", "edit", "x.qrr", "--prune-joints", "-o", "x.qrr"}).m_Status, 0);
+	EXPECT_EQ(Advice({})["prune"].size(), 0u);
+}
+
+TEST_F(Advise, TargetsThatPullAgainstEachOther)
+{
+	Create({"--rotation", "Hips:Hips", "--rotation", "LeftArm:LeftArm", "--rotation", "LeftForeArm:LeftForeArm"});
+	const VJson alone = Advice({"--source", c_Performer})["range"];
+	EXPECT_EQ(alone["conflicts"].size(), 0u) << alone;
+	EXPECT_GT(alone["poses"].get<int>(), 20);
+	// The character's arm has another length: where the performer's turns, position and rotation want two things.
+	Create({"--position", "Hips:Hips", "--rotation", "Hips:Hips", "--rotation", "LeftArm:LeftArm", "--rotation",
+	    "LeftForeArm:LeftForeArm", "--position", "LeftHand:LeftHand", "--weight", "4=100", "--scale", "0.7"});
+	bool bAgainst = false;
+	const VJson range = Advice({"--source", c_Performer})["range"];
+	for (const VJson& rConflict : range["conflicts"])
+		bAgainst = bAgainst || (rConflict["target"].get<int>() < 4 && rConflict["against"] == 4);
+	EXPECT_TRUE(bAgainst);
+}
+
+TEST_F(Advise, WrongInput)
+{
+	Create({});
+	RunRows(
+	    {
+	        {"no subject", {"-q", "advise", "none.qrr"}, 3, "", "\"none.qrr\" could not be read"},
+	        {"no skin", {"-q", "advise", "x.qrr", "--fbx", "x.qrr"}, 3, "", "could not be read whole as FBX"},
+	        {"nothing to solve", {"-q", "advise", "x.qrr", "--source", c_Performer}, 0, "there is no target", ""},
+	    },
+	    m_Folder);
+}
+
+} // namespace
