@@ -189,3 +189,26 @@ TEST(Render, TellsWhatItLacks)
 }
 
 } // namespace
+
+/// The frames of a take stand beside each other, each with what moved since the one before.
+TEST(Render, DrawsAStripOfATake)
+{
+	const VSubjectFolder folder;
+	const VRun run = folder.Run({"-q", "render", "x.qrr", "--source", c_Performer, "--take",
+	    Data("motion/chest_yxz_120fps.bvh"), "--frames", "0:60:30", "--size", "120x100", "-o", "strip.png"});
+	ASSERT_EQ(run.m_Status, 0) << run.m_Err;
+	const QImage strip = QImage::fromData(QByteArray::fromStdString(folder.Read("strip.png")));
+	ASSERT_EQ(strip.size(), QSize(360, 100));
+	const QImage first = strip.copy(0, 0, 120, 100);
+	EXPECT_NE(first, strip.copy(120, 0, 120, 100));
+	EXPECT_NE(first, strip.copy(240, 0, 120, 100));
+	const VRun one = folder.Run({"-q", "render", "x.qrr", "--source", c_Performer, "--take",
+	    Data("motion/chest_yxz_120fps.bvh"), "--frame", "0", "--size", "120x100", "-o", "one.png"});
+	EXPECT_EQ(one.m_Status, 0) << one.m_Err;
+	EXPECT_EQ(QImage::fromData(QByteArray::fromStdString(folder.Read("one.png"))), first);
+	EXPECT_EQ(folder
+	              .Run({"-q", "render", "x.qrr", "--source", c_Performer, "--take", Data("motion/chest_yxz_120fps.bvh"),
+	                  "--frame", "61", "-o", "no.png"})
+	              .m_Status,
+	    2);
+}

@@ -1,6 +1,7 @@
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Parsing.h"
 #include "retarget/commands/Commands.h"
+#include "retarget/subject/PosedByTake.h"
 #include "retarget/subject/Session.h"
 #include "retarget/subject/SolvePlot.h"
 #include "retarget/subject/SolveText.h"
@@ -10,8 +11,6 @@
 #include "retarget/text/OutputFile.h"
 
 #include "ComputeSubjectFK/ConstructionException.h"
-#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
-#include "CoreOrlexTypesUtils/joints/PoseVector.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
 #include "RetargetSetupCore/GlobalScale.h"
@@ -20,7 +19,6 @@
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
 
-#include <charconv>
 #include <cstdio>
 #include <unistd.h>
 
@@ -40,7 +38,7 @@ struct VSolveSettings
 	std::shared_ptr<TakeIO::VTakeSettings> m_pTake = std::make_shared<TakeIO::VTakeSettings>();
 	std::optional<std::size_t> m_FirstFrame;
 	std::optional<std::size_t> m_LastFrame;
-	TakeSolve::VSourceSettings m_Pairs;
+	std::shared_ptr<TakeSolve::VSourceSettings> m_pPairs = std::make_shared<TakeSolve::VSourceSettings>();
 	std::optional<double> m_MaximumPosition;
 	std::optional<double> m_MaximumRotation;
 	bool m_bCsv = false;
@@ -48,28 +46,12 @@ struct VSolveSettings
 	VMotionOutput m_Motion;
 };
 
-/// A subject in numbers, with the states of its bind pose.
-struct VPosed
-{
-	explicit VPosed(const VSubjectParametrised& i_rSubject)
-	    : m_BindPose(CoreOrlexTypesUtils::PoseVector(i_rSubject, &VSubjectParametrised::VJoint::m_BindPose))
-	{
-		for (const auto& rFailure :
-		    CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertAllOfSubject(i_rSubject, m_Subject))
-			m_Subject.m_Targets[rFailure.m_Index].m_Type = VSubject::VTarget::EBadTargetType;
-	}
-	VSubject m_Subject;
-	std::vector<double> m_BindPose;
-};
-
 /// "A:B", where either may be left out, or one frame.
 std::string ParseFrames(const std::string& i_rText, VSolveSettings& io_rSettings)
 {
 	const auto parse = [](std::string_view i_Text, std::optional<std::size_t>& o_rFrame)
 	{
-		std::size_t frame = 0;
-		const auto [pEnd, error] = std::from_chars(i_Text.data(), i_Text.data() + i_Text.size(), frame);
-		if (error == std::errc() && pEnd == i_Text.data() + i_Text.size())
+		if (std::size_t frame = 0; ParseFrame(i_Text, frame))
 			o_rFrame = frame;
 		return i_Text.empty() || o_rFrame.has_value();
 	};
@@ -78,16 +60,6 @@ std::string ParseFrames(const std::string& i_rText, VSolveSettings& io_rSettings
 	const bool bFine = !text.empty() && parse(text.substr(0, colon), io_rSettings.m_FirstFrame)
 	    && parse(text.substr(colon == std::string::npos ? 0 : colon + 1), io_rSettings.m_LastFrame);
 	return bFine ? std::string() : "\"" + i_rText + "\" is not FIRST:LAST, two numbers of frames";
-}
-
-/// The last ":" splits, since names of joints may have a namespace.
-std::string ParseJoint(const std::string& i_rText, std::vector<TakeSolve::VNamedPair>& io_rPairs)
-{
-	const std::size_t colon = i_rText.rfind(':');
-	if (colon == std::string::npos || colon == 0 || colon + 1 == i_rText.size())
-		return "\"" + i_rText + "\" is not JOINT:SEGMENT";
-	io_rPairs.push_back({i_rText.substr(0, colon), i_rText.substr(colon + 1)});
-	return {};
 }
 
 /// On a terminal a bar that goes when the work is done; nothing elsewhere.
@@ -187,7 +159,7 @@ EExitStatus Solve(VSolveSettings i_Settings)
 
 	std::string error;
 	const auto pMotion =
-	    TakeSolve::VSourceMotion::Make(source.m_Subject, source.m_BindPose, pTake, i_rSettings.m_Pairs, error);
+	    TakeSolve::VSourceMotion::Make(source.m_Subject, source.m_BindPose, pTake, *i_rSettings.m_pPairs, error);
 	if (!pMotion)
 		throw VCommandError(EWrongUsage, error);
 	const std::size_t last = LastFrameOrRefuse(i_rSettings, pTake->m_Frames);
@@ -270,32 +242,7 @@ VCommand AddSolveCommand(CLI::App& io_rProgram)
 	    ->check(NotEmpty());
 	AddParsedOption(*pApp, "--frames", "FIRST:LAST", "Only these frames; the take's first is 0",
 	    [pSettings](const std::string& i_rText) { return ParseFrames(i_rText, *pSettings); });
-	pApp->add_option_function<std::vector<std::string>>(
-	        "--joint",
-	        [pSettings](const std::vector<std::string>& i_rTexts)
-	        {
-		        for (const std::string& rText : i_rTexts)
-			        if (const std::string wrong = ParseJoint(rText, pSettings->m_Pairs.m_Joints); !wrong.empty())
-				        throw CLI::ValidationError("--joint", wrong);
-	        },
-	        "The joint of the take drives this segment of the performer; any number of times. Without it names and the "
-	        "shape of the body tell")
-	    ->option_text("JOINT:SEGMENT")
-	    ->expected(1)
-	    ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
-	AddParsedOption(*pApp, "--rest-frame", "FRAME",
-	    "In this frame the performer stands as in the bind pose. Without it the take's rest pose counts, each bone's "
-	    "direction brought onto the performer's",
-	    [pSettings](const std::string& i_rText)
-	    {
-		    std::optional<double> frame;
-		    const std::string wrong = ParseNumber(i_rText, 0.0, 1e9, frame);
-		    if (wrong.empty() && *frame != std::floor(*frame))
-			    return "\"" + i_rText + "\" is no number of a frame";
-		    if (wrong.empty())
-			    pSettings->m_Pairs.m_RestFrame = std::size_t(*frame);
-		    return wrong;
-	    });
+	AddPairOptions(*pApp, pSettings->m_pPairs);
 	AddTakeOptions(*pApp, pSettings->m_pTake);
 	AddParsedOption(*pApp, "--max-position", "MM",
 	    "Exit status 1, with their names, if a target is off by more in any frame",

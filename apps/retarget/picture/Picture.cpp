@@ -2,9 +2,11 @@
 
 #include "CommandLineText/Display.h"
 #include "CommandLineText/Messages.h"
+#include "retarget/subject/PosedByTake.h"
 #include "retarget/subject/Session.h"
 #include "retarget/text/Output.h"
 
+#include "ComputeSubjectFK/ConstructionException.h"
 #include "CoreGraphics/ShaderLibrary.h"
 #include "InMemoryHost/Flow.h"
 #include "InMemoryHost/Selection.h"
@@ -22,9 +24,11 @@
 #include <QOffscreenSurface>
 #include <QOpenGLContext>
 #include <QOpenGLFramebufferObject>
+#include <QPainter>
 #include <QQmlPropertyMap>
 
 #include <algorithm>
+#include <optional>
 
 namespace CommandLine
 {
@@ -89,6 +93,53 @@ QImage Draw(VSession& io_rSession, const VRenderSettings& i_rSettings)
 	return target.toImage();
 }
 
+/// The pictures of a take's frames, one beside the other. The session is of this picture alone: its subjects are
+/// replaced by copies that stand as in the frame.
+QImage DrawTake(VSession& io_rSession, const VRenderSettings& i_rSettings)
+{
+	const auto pTake = std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rSettings.m_Take, *i_rSettings.m_pTake));
+	const auto source = io_rSession.Document().SourceValues();
+	const auto target = io_rSession.Document().TargetValues();
+	const VPosed posedSource(*source.m_pParametrised);
+	const VPosed posedTarget(*target.m_pParametrised);
+	std::string error;
+	const auto pMotion = TakeSolve::VSourceMotion::Make(
+	    posedSource.m_Subject, posedSource.m_BindPose, pTake, *i_rSettings.m_pPairs, error);
+	if (!pMotion)
+		throw VCommandError(EWrongUsage, error);
+	if (i_rSettings.m_Frames.back() >= pTake->m_Frames)
+		throw VCommandError(EWrongUsage, "The take has the frames 0 to " + std::to_string(pTake->m_Frames - 1));
+	std::optional<TakeSolve::VTakeSolve> made;
+	try
+	{
+		made.emplace(posedTarget.m_Subject, posedTarget.m_BindPose, pMotion);
+	}
+	catch (const ComputeSubject::VConstructionException&)
+	{
+		throw VCommandError(
+		    EBadInput, "\"" + i_rSettings.m_In + "\" has a joint without kinematics; retarget check tells which");
+	}
+	TakeSolve::VTakeSolve& rSolve = *made;
+	const int count = int(i_rSettings.m_Frames.size());
+	QImage strip;
+	std::size_t next = 0;
+	for (int i = 0; i < count; ++i)
+	{
+		// All frames up to it, as a solve of the take has them.
+		const std::vector<double>* pStates = nullptr;
+		for (; next <= i_rSettings.m_Frames[std::size_t(i)]; ++next)
+			pStates = &rSolve.Solve(next).m_States;
+		io_rSession.Document().SetSourceSubject(
+		    WithWorldPoses(*source.m_pParametrised, rSolve.SourcePoses()), *source.m_pApplicationData);
+		io_rSession.Document().SetTargetSubjectParametrised(WithBindPose(*target.m_pParametrised, *pStates));
+		const QImage picture = Draw(io_rSession, i_rSettings);
+		if (strip.isNull())
+			strip = QImage(count * picture.width(), picture.height(), picture.format());
+		QPainter(&strip).drawImage(i * picture.width(), 0, picture);
+	}
+	return strip;
+}
+
 void Save(const QImage& i_rPicture, const std::string& i_rPath)
 {
 	QByteArray bytes;
@@ -128,7 +179,8 @@ EExitStatus RenderPicture(const VRenderSettings& i_rSettings)
 		throw VCommandError(EBadOutput,
 		    "This display (" + QGuiApplication::platformName().toStdString()
 		        + ") has no OpenGL to draw with: try LIBGL_ALWAYS_SOFTWARE=1, or run the command with \"xvfb-run -a\"");
-	Save(Draw(session, i_rSettings), i_rSettings.m_Out.m_Path);
+	Save(i_rSettings.m_Take.empty() ? Draw(session, i_rSettings) : DrawTake(session, i_rSettings),
+	    i_rSettings.m_Out.m_Path);
 	return EFine;
 }
 

@@ -5,6 +5,8 @@
 
 #include <boost/filesystem/operations.hpp>
 
+#include <algorithm>
+#include <array>
 #include <charconv>
 
 namespace CommandLine
@@ -30,9 +32,36 @@ bool ParseSize(const std::string& i_rText, VRenderSettings& o_rSettings)
 	return side(o_rSettings.m_Width) && pNext != pEnd && *pNext++ == 'x' && side(o_rSettings.m_Height) && pNext == pEnd;
 }
 
+/// Pictures of a strip.
+constexpr std::size_t c_MostFrames = 64;
+
+/// "A:B:STEP".
+std::string ParseStrip(const std::string& i_rText, std::vector<std::size_t>& o_rFrames)
+{
+	std::array<std::size_t, 3> numbers{};
+	std::string_view text = i_rText;
+	for (std::size_t i = 0; i < numbers.size(); ++i)
+	{
+		const std::size_t colon = i + 1 < numbers.size() ? text.find(':') : text.size();
+		if (colon == std::string_view::npos || !ParseFrame(text.substr(0, colon), numbers[i]))
+			return "\"" + i_rText + "\" is not FIRST:LAST:STEP, three numbers";
+		text.remove_prefix(std::min(colon + 1, text.size()));
+	}
+	const auto [first, last, step] = numbers;
+	if (step == 0 || last < first || (last - first) / step >= c_MostFrames)
+		return "\"" + i_rText + "\" makes no strip of 1 to " + std::to_string(c_MostFrames) + " frames";
+	for (std::size_t frame = first; frame <= last; frame += step)
+		o_rFrames.push_back(frame);
+	return {};
+}
+
 EExitStatus Render(const VRenderSettings& i_rSettings, const VRender& i_rRender)
 {
-	CheckOutput(i_rSettings.m_Out, c_PictureFile, {i_rSettings.m_In, i_rSettings.m_Source});
+	CheckOutput(i_rSettings.m_Out, c_PictureFile, {i_rSettings.m_In, i_rSettings.m_Source, i_rSettings.m_Take});
+	if (i_rSettings.m_Take.empty() != i_rSettings.m_Frames.empty())
+		throw VCommandError(EWrongUsage, "--take goes with --frame or --frames, which tell what of it is drawn");
+	if (!i_rSettings.m_Take.empty() && i_rSettings.m_Source.empty())
+		throw VCommandError(EWrongUsage, "--take needs --source, the performer that it poses");
 	boost::system::error_code error;
 	if (!i_rSettings.m_Skins.empty() && !boost::filesystem::is_directory(i_rSettings.m_Skins, error))
 		throw VCommandError(EBadInput, "There is no folder \"" + i_rSettings.m_Skins + "\" to look for skins in");
@@ -48,6 +77,7 @@ VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender)
 	    "only command that needs a display with OpenGL",
 	    {"render hero.qrr -o hero.png",
 	        "render hero.qrr --source performer.qrs --view front --size 1920x1080 -o front.png",
+	        "render hero.qrr --source performer.qrs --take walk.bvh --frames 0:200:40 --size 320x480 -o strip.png",
 	        "render hero.qrr -o - >hero.png"});
 	const auto pSettings = std::make_shared<VRenderSettings>();
 	pSettings->m_View = c_Views.front();
@@ -80,6 +110,26 @@ VCommand AddRenderCommand(CLI::App& io_rProgram, const VRender& i_rRender)
 	    ->option_text("OUT.png")
 	    ->required();
 	AddForceOption(*pApp, pSettings->m_Out);
+	pApp->add_option("--take", pSettings->m_Take,
+	        "Draw both as they stand in frames of this motion (BVH or FBX file), the target as our own solve has it; "
+	        "the host's may weigh things differently")
+	    ->option_text("TAKE")
+	    ->check(NotEmpty());
+	AddParsedOption(*pApp, "--frame", "FRAME", "The frame of the take; the first is 0",
+	    [pSettings](const std::string& i_rText)
+	    {
+		    pSettings->m_Frames.assign(1, 0);
+		    return ParseFrame(i_rText, pSettings->m_Frames.front()) ? std::string()
+		                                                            : "\"" + i_rText + "\" is no number of a frame";
+	    });
+	AddParsedOption(*pApp, "--frames", "FIRST:LAST:STEP", "A strip of frames, one beside the other, each of the --size",
+	    [pSettings](const std::string& i_rText)
+	    {
+		    pSettings->m_Frames.clear();
+		    return ParseStrip(i_rText, pSettings->m_Frames);
+	    });
+	AddTakeOptions(*pApp, pSettings->m_pTake);
+	AddPairOptions(*pApp, pSettings->m_pPairs);
 	return {pApp, [pSettings, i_rRender] { return Render(*pSettings, i_rRender); }};
 }
 

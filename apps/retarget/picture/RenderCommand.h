@@ -1,6 +1,7 @@
 #pragma once
 
 #include "CommandLineText/ExitStatus.h"
+#include "retarget/subject/TakeFile.h"
 #include "retarget/text/OutputFile.h"
 
 #include <array>
@@ -23,6 +24,12 @@ struct VRenderSettings
 	std::string m_View;
 	int m_Width = 1280;
 	int m_Height = 720;
+	/// Empty for the bind poses.
+	std::string m_Take;
+	std::shared_ptr<TakeIO::VTakeSettings> m_pTake = std::make_shared<TakeIO::VTakeSettings>();
+	std::shared_ptr<TakeSolve::VSourceSettings> m_pPairs = std::make_shared<TakeSolve::VSourceSettings>();
+	/// One beside the other.
+	std::vector<std::size_t> m_Frames;
 };
 
 /// The views by name, in the order of the preview's camera types.

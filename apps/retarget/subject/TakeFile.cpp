@@ -9,6 +9,7 @@
 #include "math/NumberText.h"
 
 #include <algorithm>
+#include <charconv>
 
 namespace CommandLine
 {
@@ -28,6 +29,16 @@ std::string ParseUnit(const std::string& i_rText, std::optional<double>& o_rUnit
 		    ? std::string()
 		    : "\"" + i_rText + "\" is none of mm, cm, m, inch, and no number of millimetres";
 	o_rUnit = pFound->second;
+	return {};
+}
+
+/// The last ":" splits, since names of joints may have a namespace.
+std::string ParseJoint(const std::string& i_rText, std::vector<TakeSolve::VNamedPair>& io_rPairs)
+{
+	const std::size_t colon = i_rText.rfind(':');
+	if (colon == std::string::npos || colon == 0 || colon + 1 == i_rText.size())
+		return "\"" + i_rText + "\" is not JOINT:SEGMENT";
+	io_rPairs.push_back({i_rText.substr(0, colon), i_rText.substr(colon + 1)});
 	return {};
 }
 
@@ -82,6 +93,41 @@ void AddTakeOptions(CLI::App& io_rApp, const std::shared_ptr<VTakeSettings>& i_r
 	AddParsedOption(io_rApp, "--rate", "HZ", "Frames a second that the take is brought to; without it the file's own",
 	    [i_rpSettings](const std::string& i_rText)
 	    { return ParseNumber(i_rText, Limits::c_LeastRate, Limits::c_GreatestRate, i_rpSettings->m_Rate); });
+}
+
+void AddPairOptions(CLI::App& io_rApp, const std::shared_ptr<TakeSolve::VSourceSettings>& i_rpSettings)
+{
+	io_rApp
+	    .add_option_function<std::vector<std::string>>(
+	        "--joint",
+	        [i_rpSettings](const std::vector<std::string>& i_rTexts)
+	        {
+		        for (const std::string& rText : i_rTexts)
+			        if (const std::string wrong = ParseJoint(rText, i_rpSettings->m_Joints); !wrong.empty())
+				        throw CLI::ValidationError("--joint", wrong);
+	        },
+	        "The joint of the take drives this segment of the performer; any number of times. Without it names and the "
+	        "shape of the body tell")
+	    ->option_text("JOINT:SEGMENT")
+	    ->expected(1)
+	    ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+	AddParsedOption(io_rApp, "--rest-frame", "FRAME",
+	    "In this frame the performer stands as in the bind pose. Without it the take's rest pose counts, each bone's "
+	    "direction brought onto the performer's",
+	    [i_rpSettings](const std::string& i_rText)
+	    {
+		    std::size_t frame = 0;
+		    if (!ParseFrame(i_rText, frame))
+			    return "\"" + i_rText + "\" is no number of a frame";
+		    i_rpSettings->m_RestFrame = frame;
+		    return std::string();
+	    });
+}
+
+bool ParseFrame(std::string_view i_Text, std::size_t& o_rFrame)
+{
+	const auto [pEnd, error] = std::from_chars(i_Text.data(), i_Text.data() + i_Text.size(), o_rFrame);
+	return error == std::errc() && pEnd == i_Text.data() + i_Text.size();
 }
 
 VTake ReadTakeFile(const std::string& i_rPath, const VTakeSettings& i_rSettings)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "TakeIO/ReadTake.h"
+#include "TakeSolve/SourceMotion.h"
 
 #include <CLI/CLI.hpp>
 
@@ -14,6 +15,9 @@ namespace CommandLine
 /// Adds --up, --stack, --unit and --rate.
 void AddTakeOptions(CLI::App& io_rApp, const std::shared_ptr<TakeIO::VTakeSettings>& i_rpSettings);
 
+/// Adds --joint and --rest-frame.
+void AddPairOptions(CLI::App& io_rApp, const std::shared_ptr<TakeSolve::VSourceSettings>& i_rpSettings);
+
 /// Throws VCommandError with EBadInput for a file that cannot be read as a take.
 TakeIO::VTake ReadTakeFile(const std::string& i_rPath, const TakeIO::VTakeSettings& i_rSettings);
 
@@ -24,6 +28,9 @@ void AddParsedOption(CLI::App& io_rApp, const std::string& i_rName, const std::s
 /// What is wrong with a text that should be a number in a range; empty if nothing is.
 std::string ParseNumber(
     const std::string& i_rText, double i_Least, double i_Greatest, std::optional<double>& o_rNumber);
+
+/// A whole number from 0 on.
+bool ParseFrame(std::string_view i_Text, std::size_t& o_rFrame);
 
 /// The file's name without folder and extension.
 std::string StemOf(const std::string& i_rPath);

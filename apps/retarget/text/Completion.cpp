@@ -255,6 +255,7 @@ constexpr VValue c_Values[] = {
     {"FILE.qrr", Files},
     {"FILE.qrs", Files},
     {"FIRST:LAST", Nothing},
+    {"FIRST:LAST:STEP", Nothing},
     {"FOLDER", Folders},
     {"FRAME", Nothing},
     {"HZ", Nothing},
