@@ -21,6 +21,7 @@ constexpr const char* c_pExamples =
     "  retarget-studio\n"
     "  retarget-studio --source performer.qrs --fbx hero.fbx\n"
     "  retarget-studio hero.qrr\n"
+    "  retarget-studio --source performer.qrs --target hero.qrr --take walk.bvh\n"
     "  retarget-studio --source performer.qrs --target hero.qrr --screenshot hero.png --size 1920x1080\n"
     "\n"
     "Messages go to the log list of the window and to standard error as \"level category: text\".\n"
@@ -52,7 +53,8 @@ QSize ParseSize(const std::string& i_rText)
 std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::string& o_rText)
 {
 	const auto pMessages = std::make_shared<CommandLine::VMessageSettings>();
-	std::string module, settings, fbx, source, target, screenshot, size;
+	std::string module, settings, fbx, source, target, take, screenshot, size;
+	std::size_t frame = 0;
 	std::vector<std::string> files;
 	bool bDeveloper = false;
 
@@ -62,10 +64,15 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	app.set_version_flag("--version", "retarget-studio " RETARGET_VERSION, "Show the version and exit");
 	app.footer(c_pExamples);
 	app.allow_extras();
-	app.add_option("FILE", files, "Files to open, by kind: .qrs, .fbx, .qrr or .qrx");
+	app.add_option("FILE", files, "Files to open, by kind: " + AllExtensions().toStdString());
 	app.add_option("--source", source, "Open the performer's skeleton")->option_text("FILE.qrs");
 	app.add_option("--fbx", fbx, "Open the character's skeleton")->option_text("FILE.fbx");
 	app.add_option("--target", target, "Open a retarget subject")->option_text("FILE.qrr");
+	CLI::Option* const pTake = app.add_option("--take", take, "Play a take of the performer: BVH or FBX file");
+	pTake->option_text("TAKE");
+	app.add_option("--frame", frame, "Show this frame of the take first; its first is 0")
+	    ->option_text("NUMBER")
+	    ->needs(pTake);
 	app.add_option("--screenshot", screenshot, "Save a picture of the window when it is ready, and end")
 	    ->option_text("OUT.png");
 	app.add_option("--size", size, "Size of the window in pixels; 1280x800 for pictures")->option_text("WxH");
@@ -96,6 +103,8 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	options.m_Settings = QString::fromStdString(settings);
 	options.m_Screenshot = QString::fromStdString(screenshot);
 	options.m_bDeveloper = bDeveloper;
+	options.m_Take = QString::fromStdString(take);
+	options.m_Frame = frame;
 	if (!size.empty())
 		options.m_Size = ParseSize(size);
 	else if (!screenshot.empty())
@@ -118,7 +127,7 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	{
 		if (KindOf(QString::fromStdString(rFile)) == EFileKind::EOther)
 			throw CommandLine::VCommandError(CommandLine::EWrongUsage,
-			    "\"" + rFile + "\" is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx");
+			    "\"" + rFile + "\" is of no kind that can be opened: " + AllExtensions().toStdString());
 		options.m_Files << QString::fromStdString(rFile);
 	}
 	SortByKind(options.m_Files);

@@ -22,6 +22,10 @@ struct VOptions
 	QString m_Settings;
 	/// To open at the start, in this order.
 	QStringList m_Files;
+	/// To play; empty for none.
+	QString m_Take;
+	/// Of the take, to be shown first.
+	std::size_t m_Frame = 0;
 	/// Where the picture goes; empty for a window that stays.
 	QString m_Screenshot;
 	QSize m_Size;

@@ -124,6 +124,8 @@ int RunWindow(QApplication& io_rApplication, const VOptions& i_rOptions)
 		window.OfferLeftWork();
 	for (const QString& rFile : i_rOptions.m_Files)
 		window.Open(rFile);
+	if (!i_rOptions.m_Take.isEmpty())
+		window.OpenTake(i_rOptions.m_Take, i_rOptions.m_Frame);
 	if (!bScreenshot)
 		return QApplication::exec();
 	if (!bLoaded)

@@ -16,13 +16,14 @@ TEST(Options, WrongLines)
 	    {{"--fbx", "a.qrs"}, "\"a.qrs\" is no character's FBX file (.fbx)"},
 	    {{"--source", "a.fbx"}, "\"a.fbx\" is no performer's skeleton (.qrs)"},
 	    {{"--target", "a.fbx"}, "\"a.fbx\" is no retarget subject (.qrr, .qrx)"},
-	    {{"a.txt"}, "\"a.txt\" is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx"},
+	    {{"a.txt"}, "\"a.txt\" is of no kind that can be opened: .qrs, .fbx, .qrr, .qrx or .bvh"},
 	    {{"--size", "100"}, "--size: \"100\" is not WIDTHxHEIGHT with numbers from 1 to 8192"},
 	    {{"--size", "0x100"}, "--size: \"0x100\""},
 	    {{"--size", "100x9000"}, "--size: \"100x9000\""},
 	    {{"--size", "100x100 "}, "--size: \"100x100 \""},
 	    {{"--log", "FBXIO=loud"}, "\"FBXIO=loud\" is not CATEGORY=LEVEL"},
 	    {{"--screenshot"}, "--screenshot"},
+	    {{"--frame", "3"}, "--take"},
 	};
 	for (const auto& [rArguments, pMessage] : rows)
 	{
@@ -44,8 +45,8 @@ TEST(Options, HelpAndVersionAreText)
 {
 	std::string text;
 	EXPECT_FALSE(ParseOptions({"--help"}, text));
-	for (const char* pOption : {"--source", "--fbx", "--target", "--screenshot", "--size", "--module", "--settings",
-	         "--developer", "--version", "Exit status"})
+	for (const char* pOption : {"--source", "--fbx", "--target", "--take", "--frame", "--screenshot", "--size",
+	         "--module", "--settings", "--developer", "--version", "Exit status"})
 		EXPECT_NE(text.find(pOption), std::string::npos) << pOption;
 	EXPECT_FALSE(ParseOptions({"--version"}, text));
 	EXPECT_EQ(text, "retarget-studio " RETARGET_VERSION "\n");

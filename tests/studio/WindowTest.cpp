@@ -185,7 +185,7 @@ TEST_F(Window, TakesDroppedFilesByKind)
 	    "performer.qrs opens as the performer's skeleton\ncharacter.fbx opens as the character's FBX file\n"
 	    "performer.qrr opens as the retarget subject\nnote.txt cannot be opened");
 	EXPECT_EQ(m_Messages.Take(),
-	    "2 Import: " + note.toStdString() + " is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx");
+	    "2 Import: " + note.toStdString() + " is of no kind that can be opened: .qrs, .fbx, .qrr, .qrx or .bvh");
 	EXPECT_EQ(Parameter("SourceSkeleton"), c_Source.toStdString());
 	EXPECT_EQ(Parameter("TargetFBX"), c_Fbx.toStdString());
 	EXPECT_EQ(RootProperty("currentTargetSubjectURL").toUrl(), QUrl::fromLocalFile(target));

@@ -15,6 +15,7 @@
 #include "NVX/Status.h"
 #include "RetargetSetupCore/GlobalScale.h"
 #include "TakeSolve/Performer.h"
+#include "TakeSolve/PosedSubject.h"
 #include "TakeSolve/SolvedMotion.h"
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
@@ -153,8 +154,8 @@ EExitStatus Solve(VSolveSettings i_Settings)
 	VSession session;
 	session.LoadTarget(i_rSettings.m_Subject);
 	const auto pTake = std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rSettings.m_Take, *i_rSettings.m_pTake));
-	const VPosed source(PerformerOf(i_rSettings, session, *pTake));
-	const VPosed target(session.Target());
+	const TakeSolve::VPosedSubject source(PerformerOf(i_rSettings, session, *pTake));
+	const TakeSolve::VPosedSubject target(session.Target());
 	RequireNoErrors();
 
 	std::string error;

@@ -4,6 +4,7 @@
 
 #include "CoreOrlexTypes/Subject.h"
 #include "TakeSolve/SolveReport.h"
+#include "TakeSolve/TargetWords.h"
 
 #include <string>
 #include <vector>
@@ -22,13 +23,11 @@ struct VSolveResult
 	const TakeSolve::VSolveReport& m_rReport;
 };
 
-bool IsRotationTarget(const CoreOrlexTypes::VSubject::VTarget& i_rTarget);
-/// The residuals' unit, and what they are multiplied by for it.
-const char* UnitOf(const CoreOrlexTypes::VSubject::VTarget& i_rTarget);
-double UnitFactor(const CoreOrlexTypes::VSubject::VTarget& i_rTarget);
-/// What a target follows, and the segment of the character that it stands on.
-std::string SourceOf(const CoreOrlexTypes::VSubject& i_rSubject, const CoreOrlexTypes::VSubject::VTarget& i_rTarget);
-std::string TargetOf(const CoreOrlexTypes::VSubject& i_rSubject, const CoreOrlexTypes::VSubject::VTarget& i_rTarget);
+using TakeSolve::IsRotationTarget;
+using TakeSolve::SourceOf;
+using TakeSolve::TargetOf;
+using TakeSolve::UnitFactor;
+using TakeSolve::UnitOf;
 
 /// What an animator would look for, one sentence each, with words for scripts.
 std::vector<TakeSolve::VFinding> FindingsOf(const VSolveResult& i_rResult);

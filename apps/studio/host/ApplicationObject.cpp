@@ -33,4 +33,10 @@ bool VApplicationObject::MayOverwriteChangedFile(const std::string& i_rPath)
 	return !m_AskToOverwrite || m_AskToOverwrite(i_rPath);
 }
 
+NVX::CountedPointer<TesselPluginInterface::IFlowFrame> VApplicationObject::Shown(
+    const NVX::CountedPointer<TesselPluginInterface::IFlowFrame>& i_rpDocument)
+{
+	return m_Show ? m_Show(i_rpDocument) : nullptr;
+}
+
 } // namespace StudioHost

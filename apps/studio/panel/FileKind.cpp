@@ -17,10 +17,11 @@ struct VKind
 	QStringList m_Extensions;
 };
 
-const std::array<VKind, 3>& Kinds()
+const std::array<VKind, 4>& Kinds()
 {
-	static const std::array<VKind, 3> s_Kinds = {{{EFileKind::ESource, "performer's skeleton", {"qrs"}},
-	    {EFileKind::EFbx, "character's FBX file", {"fbx"}}, {EFileKind::ETarget, "retarget subject", {"qrr", "qrx"}}}};
+	static const std::array<VKind, 4> s_Kinds = {
+	    {{EFileKind::ESource, "performer's skeleton", {"qrs"}}, {EFileKind::EFbx, "character's FBX file", {"fbx"}},
+	        {EFileKind::ETarget, "retarget subject", {"qrr", "qrx"}}, {EFileKind::ETake, "performer's take", {"bvh"}}}};
 	return s_Kinds;
 }
 
@@ -61,6 +62,16 @@ QString DialogFilter(EFileKind i_Kind)
 			for (const QString& rExtension : rKind.m_Extensions)
 				patterns << "*." + rExtension << "*." + rExtension.toUpper();
 	return QStringLiteral("%1 (%2)").arg(KindName(i_Kind), patterns.join(' '));
+}
+
+QString AllExtensions()
+{
+	QStringList extensions;
+	for (const VKind& rKind : Kinds())
+		for (const QString& rExtension : rKind.m_Extensions)
+			extensions << '.' + rExtension;
+	const QString last = extensions.takeLast();
+	return QStringLiteral("%1 or %2").arg(extensions.join(QStringLiteral(", ")), last);
 }
 
 void SortByKind(QStringList& io_rPaths)

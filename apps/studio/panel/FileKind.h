@@ -12,6 +12,7 @@ enum class EFileKind
 	ESource,
 	EFbx,
 	ETarget,
+	ETake,
 	EOther
 };
 
@@ -26,6 +27,9 @@ QString Description(EFileKind i_Kind);
 
 /// The filter of a file dialog.
 QString DialogFilter(EFileKind i_Kind);
+
+/// ".qrs, .fbx, .qrr, .qrx or .bvh".
+QString AllExtensions();
 
 /// Orders files by kind; those of one kind stay in order.
 void SortByKind(QStringList& io_rPaths);

@@ -82,6 +82,12 @@ VRetargetPanel::VRetargetPanel(
 	FollowRootItem();
 }
 
+bool VRetargetPanel::ViewHasKeyboard() const
+{
+	const QQuickItem* const pView = Item("scene");
+	return pView && pView->hasActiveFocus();
+}
+
 bool VRetargetPanel::IsReady() const
 {
 	return m_pRoot;
@@ -105,10 +111,10 @@ bool VRetargetPanel::Open(const QString& i_rPath)
 	const QFileInfo file(i_rPath);
 	const QString path = file.absoluteFilePath();
 	const EFileKind kind = KindOf(path);
-	if (kind == EFileKind::EOther)
+	if (kind == EFileKind::EOther || kind == EFileKind::ETake)
 	{
-		NVX_LOG("Import", NVX::ELogError, "%1% is of no kind that can be opened: .qrs, .fbx, .qrr or .qrx",
-		    path.toStdString());
+		NVX_LOG("Import", NVX::ELogError, "%1% is of no kind that can be opened: %2%", path.toStdString(),
+		    AllExtensions().toStdString());
 		return false;
 	}
 	if (!file.isFile() || !file.isReadable())

@@ -114,6 +114,9 @@ public:
 
 	QWidget* Widget() const { return m_pWidget; }
 
+	/// Keys go to the preview.
+	bool ViewHasKeyboard() const;
+
 	/// The panel's QML has been loaded.
 	bool IsReady() const;
 

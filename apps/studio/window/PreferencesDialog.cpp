@@ -27,8 +27,8 @@ namespace StudioHost
 namespace
 {
 
-/// The first of EPathTypes: what this panel works with.
-constexpr std::size_t c_FoldersFirst = 4;
+/// What this panel works with: the first of EPathTypes, and takes.
+constexpr std::size_t c_FoldersFirst = 5;
 
 constexpr const char* c_pProducts[] = {"Orlex Rally", "Orlex Stage"};
 
@@ -56,6 +56,8 @@ VPreferencesDialog::VPreferencesDialog(VPreferences& i_rPreferences, QWidget* i_
 	std::vector<std::pair<std::string, QString>> folders, products;
 	for (std::size_t i = 0; i < TesselPluginInterface::c_FolderKeys.size(); ++i)
 		folders.emplace_back(TesselPluginInterface::c_FolderKeys[i], FolderLabels()[i]);
+	folders.insert(
+	    folders.begin() + c_FoldersFirst - 1, {c_pTakesFolderKey, tr("Takes (recorded motion of performers)")});
 	for (const char* pProduct : c_pProducts)
 		products.emplace_back(UtilsFileSystem::ProductFolderKey(pProduct), QLatin1String(pProduct));
 

@@ -7,6 +7,7 @@
 #include "UtilsFileSystem/SaveFile.h"
 #include "studio/host/QtDispatcher.h"
 #include "studio/host/Services.h"
+#include "studio/motion/TakePlayer.h"
 #include "studio/window/StudioWindow.h"
 
 #include <QBuffer>
@@ -48,7 +49,8 @@ void VScreenshot::OnDrawn()
 
 bool VScreenshot::AtRest() const
 {
-	return m_rWindow.Dispatcher().PendingCount() == 0 && m_rWindow.Gui().GetSkinCache()->Loading().empty();
+	return m_rWindow.Dispatcher().PendingCount() == 0 && m_rWindow.Gui().GetSkinCache()->Loading().empty()
+	    && m_rWindow.Motion().AtRest();
 }
 
 bool VScreenshot::Save() const

@@ -11,7 +11,7 @@ namespace StudioHost
 class VStudioWindow;
 
 /// Saves one picture of a window when its panel has come to rest: its QML is loaded, no callback waits, no skin is
-/// being read, and it has been drawn like that.
+/// being read, no take is being read or solved, and it has been drawn like that.
 class VScreenshot : public QObject
 {
 	Q_OBJECT

@@ -109,6 +109,8 @@ void VStudioWindow::MakeFileMenu()
 	for (const VOpenRow& rRow : c_OpenRows)
 		AddAction(rMenu, rRow.m_pName, tr(rRow.m_pText), QKeySequence(rRow.m_pShortcut),
 		    [this, kind = int(rRow.m_Kind)] { AskAndOpen(kind); });
+	AddAction(
+	    rMenu, "OpenTake", tr("Open &Take..."), QKeySequence(QStringLiteral("Ctrl+T")), [this] { AskAndOpenTake(); });
 	m_pRecentMenu = Named(rMenu.addMenu(tr("Open &Recent")), "RecentMenu", tr("Files used last"));
 	connect(m_pRecentFiles.get(), &VRecentFiles::changed, this, &VStudioWindow::UpdateRecentFiles);
 	UpdateRecentFiles();
@@ -334,6 +336,7 @@ void VStudioWindow::ShowMouseAndKeys()
 	    {tr("an arrow or a square corner, dragged"), tr("moves the root of the target subject")},
 	    {tr("Esc"), tr("ends a drag of the manipulator or a rectangle as if it had not begun")},
 	    {tr("Ctrl+Z and Ctrl+Shift+Z"), tr("undo the last edit and do it again")},
+	    {tr("space, left and right"), tr("play the take that is open, or pause, and step")},
 	    {tr("Ctrl++ and Ctrl+-"), tr("make the manipulator larger and smaller")},
 	    {tr("Alt+T and Alt+R"), tr("add a position and a rotation target")}};
 	QString text = tr("<b>In the preview</b>") + QStringLiteral("<table cellpadding='3'>");

@@ -6,6 +6,8 @@
 #include "studio/host/Services.h"
 #include "studio/log/LogModel.h"
 #include "studio/log/LogPanel.h"
+#include "studio/motion/MotionPanel.h"
+#include "studio/panel/FileKind.h"
 #include "studio/panel/PanelCommands.h"
 #include "studio/panel/RecentFiles.h"
 #include "studio/panel/RetargetPanel.h"
@@ -87,6 +89,7 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	{ return MayLoseChanges(QString::fromStdString(i_rAction)); };
 
 	MakeMenus(i_bDeveloper);
+	MakeMotionDock();
 	menuBar()->setCornerWidget(new VSkinProgress(m_pGui->GetSkinCache(), m_pDispatcher));
 	resize(1280, 800);
 }
@@ -94,8 +97,9 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 VStudioWindow::~VStudioWindow()
 {
 	UnloadModule();
-	// Shows the log model, which goes before the window's children do.
+	// They show what goes before the window's children do.
 	delete m_pLogDock;
+	delete m_pMotionDock;
 }
 
 bool VStudioWindow::LoadModule(const QString& i_rPath)
@@ -133,12 +137,15 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 		m_pWorkKeeper = std::make_unique<VWorkKeeper>(*m_pRetargetPanel,
 		    QFileInfo(m_rSettings.fileName()).absoluteDir().filePath(QStringLiteral("unsaved-work")));
 		m_pRetargetPanel->OfferToBegin(StartActions());
+		m_pMotion->TakeKeysOf(
+		    *m_pRetargetPanel->Widget(), [this] { return m_pRetargetPanel && m_pRetargetPanel->ViewHasKeyboard(); });
 	}
 	UpdateTitle();
 	m_pNotice->setVisible(docks.isEmpty());
 	// Below a panel it keeps its height when the window grows; in an area of its own it would not.
 	if (!docks.isEmpty())
 		splitDockWidget(docks.front(), m_pLogDock, Qt::Vertical);
+	tabifyDockWidget(m_pLogDock, m_pMotionDock);
 	return true;
 }
 
@@ -158,6 +165,11 @@ void VStudioWindow::UnloadModule()
 
 bool VStudioWindow::Open(const QString& i_rPath)
 {
+	if (m_pRetargetPanel && KindOf(i_rPath) == EFileKind::ETake)
+	{
+		OpenTake(i_rPath);
+		return true;
+	}
 	if (m_pRetargetPanel)
 		return m_pRetargetPanel->Open(i_rPath);
 	NVX_LOG("Import", NVX::ELogError, "%1% cannot be opened: no module with a retarget panel is loaded",

@@ -12,11 +12,13 @@ namespace StudioHost
 
 class VLogModel;
 class VModule;
+class VMotionPanel;
 class VPluginContext;
 class VPluginGui;
 class VQtDispatcher;
 class VRecentFiles;
 class VRetargetPanel;
+class VTakePlayer;
 class VWorkKeeper;
 
 /// The window: the panels of the module, the log, the menus. It owns all services that the module is given, and ends
@@ -36,6 +38,10 @@ public:
 
 	/// Opens a file by its kind. False, with the reason told in the log, if it was not even tried.
 	bool Open(const QString& i_rPath);
+
+	/// Plays a take, and shows the dock for it.
+	void OpenTake(const QString& i_rPath, std::size_t i_Frame = 0);
+	VTakePlayer& Motion();
 
 	/// Runs a named command on the panels.
 	bool Execute(const QString& i_rCommand);
@@ -69,6 +75,8 @@ private:
 	void MakeViewMenu(bool i_bDeveloper);
 	void MakeToolsMenu();
 	void MakeHelpMenu();
+	void MakeMotionDock();
+	void AskAndOpenTake();
 	QAction* AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText, const QKeySequence& i_rShortcut,
 	    std::function<void()> i_Run);
 	void AskAndOpen(int i_Kind);
@@ -118,6 +126,8 @@ private:
 	/// What stands in the window where there is no panel.
 	QLabel* m_pNotice = nullptr;
 	QDockWidget* m_pLogDock = nullptr;
+	QDockWidget* m_pMotionDock = nullptr;
+	VMotionPanel* m_pMotion = nullptr;
 	/// The docks have the sizes that they shall begin with.
 	bool m_bArranged = false;
 };

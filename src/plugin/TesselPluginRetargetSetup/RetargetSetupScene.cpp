@@ -50,7 +50,19 @@ VRetargetSetupScene::VRetargetSetupScene(std::shared_ptr<CoreGraphics::VShaderLi
 {
 }
 
-VRetargetSetupScene::~VRetargetSetupScene() = default;
+VRetargetSetupScene::~VRetargetSetupScene()
+{
+	m_PreviewConnection.Disconnect();
+}
+
+void VRetargetSetupScene::SetPreviewFrames(std::shared_ptr<TesselPluginInterface::IPreviewFrames> i_pPreviewFrames)
+{
+	m_PreviewConnection.Disconnect();
+	m_pPreviewFrames = std::move(i_pPreviewFrames);
+	if (m_pPreviewFrames)
+		m_PreviewConnection =
+		    m_pPreviewFrames->ShownChangedSignal().Connect(WeakBind(&VRetargetSetupScene::RefreshScene), Dispatcher());
+}
 
 QVariantMap VRetargetSetupScene::ViewOptions()
 {
@@ -178,9 +190,16 @@ void VRetargetSetupScene::RefreshScene()
 	const auto pFrame = m_pRetargetSetup->GetCurrentFrame();
 	if (!pFrame)
 		return;
-	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pPosed;
-	m_pSubjectTransform->Transform(pPosed, pFrame, 0);
-	SetFrame(pPosed);
+	if (const auto pHosts = HostsFrame(pFrame))
+		SetFrame(pHosts);
+	else
+	{
+		NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pPosed;
+		m_pSubjectTransform->Transform(pPosed, pFrame, 0);
+		SetFrame(pPosed);
+		if (m_bHostShows)
+			m_pAwaited = pPosed;
+	}
 	const auto appears = [](const VRetargetSetupCore::VSubjectValues& i_rValues, bool& io_rbShown)
 	{
 		const bool bShown = i_rValues.m_pParametrised && !i_rValues.m_pParametrised->m_Segments.empty();
@@ -190,6 +209,35 @@ void VRetargetSetupScene::RefreshScene()
 	const bool bTarget = appears(m_pRetargetSetup->TargetValues(), m_bShowsTarget);
 	if (bSource || bTarget)
 		emit subjectAppeared();
+}
+
+NVX::CountedPointer<TesselPluginInterface::IFlowFrame> VRetargetSetupScene::HostsFrame(
+    const NVX::CountedPointer<TesselPluginInterface::IFlowFrame>& i_rpDocument)
+{
+	auto pHosts = m_pPreviewFrames ? m_pPreviewFrames->Shown(i_rpDocument) : nullptr;
+	// The drag goes on from the bind pose that it began in.
+	if (RenderManipulator() && RenderManipulator()->IsDragging())
+		pHosts.reset();
+	SetPickingRests(bool(pHosts));
+	if (!pHosts)
+		return pHosts;
+	m_pAwaited.reset();
+	if (!std::exchange(m_bHostShows, true))
+	{
+		SelectionManager()->PreSelection().Replace({});
+		UpdateManipulator();
+	}
+	return pHosts;
+}
+
+bool VRetargetSetupScene::ShowsBindPoses()
+{
+	if (m_bHostShows && m_pAwaited && PublishedFrame() == m_pAwaited)
+	{
+		m_bHostShows = false;
+		m_pAwaited.reset();
+	}
+	return !m_bHostShows;
 }
 
 std::int64_t VRetargetSetupScene::GetSelectedTargetSegment(std::vector<ISelectionItem>& o_rSelection) const
@@ -242,7 +290,7 @@ void VRetargetSetupScene::UpdateManipulator()
 	const auto pSubject = m_pRetargetSetup->TargetValues().m_pParametrised;
 	QMatrix4x4 matrix;
 	// A segment that is not drawn yet has no matrix; it gets one with the frame that draws it.
-	if (segment < 0 || !pSubject || std::size_t(segment) >= pSubject->m_Segments.size()
+	if (!ShowsBindPoses() || segment < 0 || !pSubject || std::size_t(segment) >= pSubject->m_Segments.size()
 	    || pSubject->m_Segments[std::size_t(segment)].m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy
 	    || !GetItemTransform({TargetSegment(std::size_t(segment))}, matrix))
 		segment = -1;

@@ -5,6 +5,7 @@
 #include "Flow2Graphics/FlowScene.h"
 #include "NVX/Shared.h"
 #include "TesselPluginInterface/IItemFactory.h"
+#include "TesselPluginInterface/IPreviewFrames.h"
 #include "TesselPluginRetargetSetup/ManipulatorMove.h"
 
 #include <QMatrix4x4>
@@ -43,6 +44,9 @@ public:
 	    NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory, bool i_bAllowHiddenPick);
 	~VRetargetSetupScene() override;
 
+	/// What the host shows instead of bind poses; null for a host that shows nothing else.
+	void SetPreviewFrames(std::shared_ptr<TesselPluginInterface::IPreviewFrames> i_pPreviewFrames);
+
 	static QVariantMap ViewOptions();
 	static unsigned int SourceSegmentKind() { return NVX::ESelectionSourceSegment; }
 	static unsigned int TargetKind() { return NVX::ESelectionTarget; }
@@ -55,7 +59,8 @@ public:
 	/// @param i_CameraType CoreGraphics::ECameraType
 	Q_INVOKABLE QString SideSeen(int i_CameraType) const;
 
-	/// Shows what the document has now.
+	/// Shows what the document has now, or what the host has instead. While the manipulator is dragged it is the
+	/// former.
 	void RefreshScene();
 
 	/// Connects the manipulator, once.
@@ -97,6 +102,11 @@ protected:
 
 private:
 	void OnSetupChanged();
+	/// The frame that the host has instead of this one; null if it is to be shown as it is.
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> HostsFrame(
+	    const NVX::CountedPointer<TesselPluginInterface::IFlowFrame>& i_rpDocument);
+	/// Whether places in the preview are those of the bind poses.
+	bool ShowsBindPoses();
 	/// Shows the manipulator where the selected target segment stands in the last frame, or hides it. Not while it is
 	/// dragged.
 	void UpdateManipulator();
@@ -127,6 +137,12 @@ private:
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
 	/// Makes what is shown of the document's frames.
 	std::shared_ptr<Flow2Graphics::VFlowSubjectSceneTransform> m_pSubjectTransform;
+	std::shared_ptr<TesselPluginInterface::IPreviewFrames> m_pPreviewFrames;
+	NVX::VConnection m_PreviewConnection;
+	/// The host shows something else, or what is seen is still of that time.
+	bool m_bHostShows = false;
+	/// The first frame of bind poses since; null while the host shows something else.
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pAwaited;
 	/// What the selection is of.
 	std::string m_SelectedSource;
 	std::uint64_t m_SelectedSubject = 0;

@@ -43,6 +43,7 @@ bool VTesselPluginRetargetSetup::CreateContent(
 	const auto pScene = NVX::MakeShared<VRetargetSetupScene>(i_rGui.GetGraphicsContext(), i_rContext.GetDispatcher(),
 	    i_rContext.GetSelectionManager(), i_rGui.GetSkinCache(), pRetargetSetup, i_rContext.GetItemFactory(),
 	    bSceneFlag);
+	pScene->SetPreviewFrames(TesselPluginInterface::PreviewFramesOf(i_rContext.GetApplicationObject()));
 	auto pWidget = std::make_unique<VRetargetSetupWidget>(i_rGui.GetQuickEngine(), i_rContext.GetDataStore(),
 	    i_rContext.GetParameterRegistry(), i_rContext.GetPreferenceFolders(), i_rContext.GetApplicationObject(),
 	    i_rContext.GetDispatcher(), i_rGui.GetSkinCache(), pRetargetSetup, pSelection, pScene);

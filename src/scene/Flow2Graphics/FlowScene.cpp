@@ -133,6 +133,8 @@ bool VFlowScene::Synchronise()
 	m_pPendingFrame.reset();
 	if (m_pPendingMeshes && m_pFBXScene)
 		m_pFBXScene->Set(std::move(std::exchange(m_pPendingMeshes, nullptr)->m_Meshes));
+	// Both threads are here: whoever hears of what is published finds the frame.
+	m_pPublishedFrame = m_pUpdatedFrame;
 	return VOrlexScene::Synchronise();
 }
 
@@ -156,6 +158,7 @@ void VFlowScene::Refresh()
 	}
 	if (m_pFrame)
 		OnFrame();
+	m_pUpdatedFrame = m_pFrame;
 	VOrlexScene::Refresh();
 }
 

@@ -48,6 +48,9 @@ public:
 	/// What is to be shown from the next exchange on. User interface thread.
 	void SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame);
 
+	/// The frame that bounds and matrices of items are of; null before the first. User interface thread.
+	const NVX::CountedPointer<TesselPluginInterface::IFlowFrame>& PublishedFrame() const { return m_pPublishedFrame; }
+
 	void InitialiseGL() override;
 	bool Synchronise() override;
 	/// The frame update.
@@ -82,11 +85,13 @@ private:
 	NVX::VConnection m_SkinConnection;
 	/// Of the user interface thread.
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pPendingFrame;
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pPublishedFrame;
 	struct VFBXMeshes;
 	/// Of the user interface thread; null when there are no new ones.
 	std::unique_ptr<VFBXMeshes> m_pPendingMeshes;
-	/// Of the render thread.
+	/// Of the render thread; the other one is that of the last frame update.
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pFrame;
+	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pUpdatedFrame;
 };
 
 } // namespace Flow2Graphics

@@ -103,6 +103,9 @@ public:
 
 	bool YUp() const { return m_bYUp; }
 	void SetYUp(bool i_bYUp);
+	/// Nothing is picked, and what was is forgotten.
+	void SetPickingRests(bool i_bRests) { m_bPickingRests = i_bRests; }
+	bool PickingRests() const { return m_bPickingRests; }
 	const std::vector<VCameraDefinition>& CameraDefinitions() const { return m_Published.m_Cameras; }
 	const std::vector<VSubjectLabel>& SubjectLabels() const { return m_Published.m_SubjectLabels; }
 	const std::vector<VSubjectLabel>& PropLabels() const { return m_Published.m_PropLabels; }
@@ -177,6 +180,7 @@ private:
 	bool m_bRefreshRequested = false;
 	bool m_bYUp = false;
 	bool m_bYUpSet = false;
+	bool m_bPickingRests = false;
 	VOverlay m_Published;
 	std::shared_ptr<const VItemPlaces> m_pPlaces;
 

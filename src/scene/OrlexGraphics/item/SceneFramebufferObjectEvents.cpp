@@ -194,6 +194,8 @@ void VSceneFramebufferObject::hoverMoveEvent(QHoverEvent* io_pEvent)
 	// A commit is still to come.
 	if (m_MouseState != EMouseClicked && m_MouseState != EMouseDragged)
 		m_MouseState = EMouseHovering;
+	if (m_pScene && m_pScene->PickingRests())
+		ClearPreview();
 	SetModifiers(io_pEvent->modifiers());
 	SetMousePos(io_pEvent->pos());
 	update();

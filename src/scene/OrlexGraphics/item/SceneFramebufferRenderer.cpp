@@ -135,8 +135,13 @@ void VSceneFramebufferRenderer::synchronize(QQuickFramebufferObject* io_pItem)
 
 	Track(rItem);
 
-	// A frame that is still to be drawn is not the one that was picked from.
 	const VOrlexScene* const pScene = m_Renderer.Scene().get();
+	if (pScene && pScene->PickingRests())
+	{
+		m_Pick.reset();
+		rItem.m_MouseState = EMouseIdle;
+	}
+	// A frame that is still to be drawn is not the one that was picked from.
 	const std::uint64_t frame = m_Renderer.UpdateCount() + (pScene && pScene->NeedsRefresh() ? 1 : 0);
 	if (m_Pick)
 		rItem.CommitPick(*m_Pick, rItem.MakePickRequest(frame));

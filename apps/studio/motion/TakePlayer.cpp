@@ -1,0 +1,331 @@
+#include "studio/motion/TakePlayer.h"
+
+#include "CoreOrlexTypes/SubjectState.h"
+#include "DebugServices/GlobalLog.h"
+
+#include <QFileInfo>
+
+#include <algorithm>
+#include <cmath>
+
+using TesselPluginInterface::IFlowFrame;
+using TesselPluginInterface::IFlowItem;
+using TesselPluginInterface::ItemValue;
+
+namespace StudioHost
+{
+namespace
+{
+
+constexpr const char* c_pCategory = "Motion";
+/// Milliseconds; screens show no more pictures.
+constexpr int c_Tick = 16;
+
+} // namespace
+
+VTakePlayer::VTakePlayer(NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory)
+    : m_pItemFactory(std::move(i_pItemFactory))
+{
+	m_Clock.setTimerType(Qt::PreciseTimer);
+	m_Clock.setInterval(c_Tick);
+	connect(&m_Clock, &QTimer::timeout, this, &VTakePlayer::Tick);
+	connect(&m_Solving, &VTakeSolving::read, this, &VTakePlayer::TakeRead);
+	connect(&m_Solving, &VTakeSolving::pictured, this, &VTakePlayer::TakePicture);
+	connect(&m_Solving, &VTakeSolving::prepared, this,
+	    [this](const QStringList& i_rFindings, const QString& i_rError)
+	    {
+		    for (const QString& rFinding : i_rFindings)
+			    NVX_LOG(c_pCategory, NVX::ELogWarning, "%1%", rFinding.toStdString());
+		    if (!i_rError.isEmpty())
+		    {
+			    NVX_LOG(c_pCategory, NVX::ELogError, "The take cannot be played: %1%", i_rError.toStdString());
+			    m_bJudging = false;
+			    m_Trouble = i_rError;
+			    Stop();
+			    emit takeChanged();
+		    }
+	    });
+	connect(&m_Solving, &VTakeSolving::exported, this,
+	    [](const QString& i_rPath, const QString& i_rError)
+	    {
+		    if (i_rError.isEmpty())
+			    NVX_LOG(c_pCategory, NVX::ELogInformation, "The character's motion is written to %1%",
+			        i_rPath.toStdString());
+		    else
+			    NVX_LOG(c_pCategory, NVX::ELogError, "The character's motion is not written to %1%: %2%",
+			        i_rPath.toStdString(), i_rError.toStdString());
+	    });
+	connect(&m_Solving, &VTakeSolving::progressed, this,
+	    [this](int i_Solved)
+	    {
+		    m_Solved = i_Solved;
+		    emit solvedChanged();
+	    });
+	connect(&m_Solving, &VTakeSolving::judged, this,
+	    [this](std::shared_ptr<const VJudgedTake> i_pJudged)
+	    {
+		    m_pJudged = std::move(i_pJudged);
+		    m_Solved = int(Frames());
+		    m_bJudging = false;
+		    emit solvedChanged();
+	    });
+}
+
+void VTakePlayer::Open(const QString& i_rPath, std::size_t i_Frame)
+{
+	m_ReadingFrame = i_Frame;
+	m_Reading = QFileInfo(i_rPath).absoluteFilePath();
+	m_Solving.Read(m_Reading);
+	emit takeChanged();
+}
+
+void VTakePlayer::TakeRead(
+    const QString& i_rPath, std::shared_ptr<const TakeIO::VTake> i_pTake, const QString& i_rError)
+{
+	m_Reading.clear();
+	if (!i_pTake)
+		NVX_LOG(c_pCategory, NVX::ELogError, "%1% is not opened as a take: %2%", i_rPath.toStdString(),
+		    i_rError.toStdString());
+	else
+	{
+		m_pTake = std::move(i_pTake);
+		m_Path = i_rPath;
+		m_Clock.stop();
+		m_In = 0;
+		m_Out = m_pTake->m_Frames - 1;
+		m_Frame = std::min(m_ReadingFrame, m_Out);
+		// He sees at once what he opened.
+		m_bShown = true;
+	}
+	// The reading ended the sequence.
+	Solve();
+	emit takeChanged();
+	emit stateChanged();
+	emit frameChanged();
+	if (m_pTake && m_Path == i_rPath)
+		emit opened(i_rPath);
+}
+
+void VTakePlayer::Close()
+{
+	m_Solving.CancelReading();
+	m_Reading.clear();
+	m_pTake.reset();
+	m_Path.clear();
+	m_Frame = m_In = m_Out = 0;
+	Stop();
+	Solve();
+	emit takeChanged();
+	emit frameChanged();
+}
+
+void VTakePlayer::Cancel()
+{
+	if (IsReading())
+	{
+		m_Solving.CancelReading();
+		m_Reading.clear();
+		Solve();
+		emit takeChanged();
+		return;
+	}
+	m_Solving.CancelSequence();
+	m_bJudging = false;
+	emit solvedChanged();
+}
+
+void VTakePlayer::Export(const QString& i_rPath)
+{
+	if (m_pJudged)
+		m_Solving.Export(i_rPath, m_In, m_Out);
+}
+
+void VTakePlayer::Solve()
+{
+	m_pJudged.reset();
+	m_Solved = 0;
+	m_Trouble = !m_pTake ? QString()
+	    : m_pSource      ? QString()
+	                     : tr("choose the performer's skeleton first; \"retarget performer\" makes one of the take");
+	m_bStale = true;
+	m_bJudging = m_pTake && m_pSource && m_pTarget && !m_pTarget->m_Targets.empty();
+	if (!m_pTake || !m_pSource)
+		m_pPicture.reset();
+	m_Solving.Solve({m_pTake, m_pTake ? m_pSource : nullptr, m_pTake ? m_pTarget : nullptr});
+	if (m_pTake)
+		m_Solving.Show(m_Frame);
+	emit solvedChanged();
+	if (m_bShown)
+		emit shownChanged();
+}
+
+void VTakePlayer::TakePicture(std::shared_ptr<const VTakePicture> i_pPicture)
+{
+	m_pPicture = std::move(i_pPicture);
+	m_bStale = false;
+	if (m_pShownSource != m_pPicture->m_pSource)
+	{
+		m_pShownSource = m_pPicture->m_pSource;
+		m_pSourceItem = m_pItemFactory->CreateItem("FlowSubject");
+		TesselPluginInterface::SetItemValue(m_pSourceItem, m_pShownSource);
+	}
+	emit pictureChanged();
+	if (m_bShown)
+		emit shownChanged();
+}
+
+bool VTakePlayer::AtRest() const
+{
+	return !IsReading() && !IsPlaying() && !m_bJudging
+	    && (!m_bShown || !m_pTake || !m_pSource || !m_Trouble.isEmpty()
+	        || (!m_bStale && m_pPicture && m_pPicture->m_Frame == m_Frame));
+}
+
+NVX::CountedPointer<IFlowItem> VTakePlayer::PoseItem(
+    const char* i_pFlowType, std::uint32_t i_SubjectId, std::vector<double> i_States) const
+{
+	NVX::CountedPointer<IFlowItem> pItem = m_pItemFactory->CreateItem(i_pFlowType);
+	TesselPluginInterface::SetItemValue(pItem,
+	    std::make_shared<const CoreOrlexTypes::VSubjectDynamicParameters>(
+	        CoreOrlexTypes::VSubjectDynamicParameters{i_SubjectId, std::move(i_States)}));
+	return pItem;
+}
+
+NVX::CountedPointer<IFlowFrame> VTakePlayer::Shown(const NVX::CountedPointer<IFlowFrame>& i_rpDocument)
+{
+	using CoreOrlexTypes::VSubjectParametrised;
+	m_pDocument = i_rpDocument;
+	auto pSource = ItemValue<VSubjectParametrised>(i_rpDocument->Item("FlowSubjectParametrised"));
+	auto pTarget = ItemValue<VSubjectParametrised>(i_rpDocument->Item("FlowSubjectParametrisedForSolving"));
+	const auto orNone = [](auto& io_rpSubject)
+	{
+		if (io_rpSubject && io_rpSubject->m_Segments.empty())
+			io_rpSubject.reset();
+	};
+	orNone(pSource);
+	orNone(pTarget);
+	if (pSource != m_pSource || pTarget != m_pTarget)
+	{
+		m_pSource = std::move(pSource);
+		m_pTarget = std::move(pTarget);
+		if (m_pTake)
+			Solve();
+	}
+	if (!m_bShown || !m_pTake || !m_pPicture)
+		return {};
+	// Until the edit is solved it is seen in the pose before.
+	NVX::CountedPointer<IFlowFrame> pFrame = i_rpDocument->Copy();
+	pFrame->AddItem(m_pSourceItem);
+	pFrame->AddItem(PoseItem("FlowSubjectDynamicParameters", m_pShownSource->m_SubjectId, m_pPicture->m_SourceStates));
+	if (m_pTarget)
+		pFrame->AddItem(
+		    PoseItem("FlowSubjectDynamicParametersForSolving", m_pTarget->m_SubjectId, m_pPicture->m_TargetStates));
+	return pFrame;
+}
+
+void VTakePlayer::Play()
+{
+	if (!m_pTake || !m_Trouble.isEmpty())
+		return;
+	m_bShown = true;
+	if (m_Frame < m_In || m_Frame >= m_Out)
+		SetFrame(m_In);
+	StartClock();
+	emit stateChanged();
+	emit shownChanged();
+}
+
+void VTakePlayer::StartClock()
+{
+	m_StartFrame = double(m_Frame);
+	m_SinceStart.start();
+	m_Clock.start();
+}
+
+void VTakePlayer::Pause()
+{
+	m_Clock.stop();
+	emit stateChanged();
+}
+
+void VTakePlayer::Stop()
+{
+	m_Clock.stop();
+	m_bShown = false;
+	emit stateChanged();
+	emit shownChanged();
+}
+
+void VTakePlayer::Seek(std::int64_t i_Frame)
+{
+	if (!m_pTake || !m_Trouble.isEmpty())
+		return;
+	SetFrame(std::size_t(std::clamp<std::int64_t>(i_Frame, 0, std::int64_t(Frames()) - 1)));
+	if (IsPlaying())
+		StartClock();
+	if (std::exchange(m_bShown, true))
+		return;
+	emit stateChanged();
+	emit shownChanged();
+}
+
+void VTakePlayer::Step(int i_Frames)
+{
+	if (IsPlaying())
+		Pause();
+	Seek(std::clamp(std::int64_t(m_Frame) + i_Frames, std::int64_t(m_In), std::int64_t(m_Out)));
+}
+
+void VTakePlayer::SetIn()
+{
+	m_In = m_Frame;
+	m_Out = std::max(m_In, m_Out);
+	emit stateChanged();
+}
+
+void VTakePlayer::SetOut()
+{
+	m_Out = m_Frame;
+	m_In = std::min(m_In, m_Out);
+	emit stateChanged();
+}
+
+void VTakePlayer::ResetRange()
+{
+	m_In = 0;
+	m_Out = Frames() - (m_pTake ? 1 : 0);
+	emit stateChanged();
+}
+
+void VTakePlayer::SetSpeed(double i_Speed)
+{
+	m_Speed = i_Speed;
+	if (IsPlaying())
+		StartClock();
+}
+
+void VTakePlayer::Tick()
+{
+	const double passed = m_Speed * m_pTake->m_Rate * double(m_SinceStart.nsecsElapsed()) * 1e-9;
+	double frame = m_StartFrame + passed;
+	const double last = double(m_Out) + 1.0;
+	if (frame >= last && !m_bLoops)
+	{
+		SetFrame(m_Out);
+		return Pause();
+	}
+	if (frame >= last)
+		frame = double(m_In) + std::fmod(frame - last, last - double(m_In));
+	SetFrame(std::size_t(frame));
+}
+
+void VTakePlayer::SetFrame(std::size_t i_Frame)
+{
+	if (i_Frame == m_Frame && !m_bStale && m_pPicture && m_pPicture->m_Frame == i_Frame)
+		return;
+	m_Frame = i_Frame;
+	m_Solving.Show(m_Frame);
+	emit frameChanged();
+}
+
+} // namespace StudioHost

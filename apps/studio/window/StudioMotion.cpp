@@ -1,0 +1,85 @@
+#include "UtilsFileSystem/Paths.h"
+#include "studio/host/Preferences.h"
+#include "studio/host/Services.h"
+#include "studio/motion/MotionPanel.h"
+#include "studio/panel/FileKind.h"
+#include "studio/panel/RecentFiles.h"
+#include "studio/window/Named.h"
+#include "studio/window/StudioWindow.h"
+
+#include <QAction>
+#include <QDockWidget>
+#include <QFileDialog>
+#include <QMenu>
+#include <QPointer>
+#include <QTimer>
+
+// The dock that plays a take.
+
+namespace StudioHost
+{
+namespace
+{
+
+/// In pixels, when it is first shown: the controls and a dozen targets.
+constexpr int c_MotionHeight = 300;
+
+} // namespace
+
+void VStudioWindow::MakeMotionDock()
+{
+	m_pMotion = new VMotionPanel(m_pContext->GetItemFactory(), *findChild<QAction*>(QStringLiteral("OpenTake")));
+	m_pMotionDock = Named(new QDockWidget(tr("Motion"), this), "MotionDock", tr("Motion"));
+	m_pMotionDock->setAcceptDrops(true);
+	m_pMotionDock->setWidget(m_pMotion);
+	addDockWidget(Qt::BottomDockWidgetArea, m_pMotionDock);
+	m_pMotionDock->hide();
+	m_pPanelMenu->addAction(m_pMotionDock->toggleViewAction());
+
+	VApplicationObject& rApplication = m_pContext->Application();
+	rApplication.m_Show = [pPlayer = QPointer<VTakePlayer>(&m_pMotion->Player())](
+	                          const NVX::CountedPointer<TesselPluginInterface::IFlowFrame>& i_rpDocument)
+	{ return pPlayer ? pPlayer->Shown(i_rpDocument) : nullptr; };
+	connect(&Motion(), &VTakePlayer::shownChanged, this, [&rApplication] { rApplication.ShownChangedSignal().Fire(); });
+	connect(&Motion(), &VTakePlayer::opened, this,
+	    [this](const QString& i_rPath)
+	    {
+		    // An FBX file would be opened as the character's.
+		    if (KindOf(i_rPath) == EFileKind::ETake)
+			    m_pRecentFiles->Add(i_rPath);
+	    });
+}
+
+VTakePlayer& VStudioWindow::Motion()
+{
+	return m_pMotion->Player();
+}
+
+void VStudioWindow::OpenTake(const QString& i_rPath, std::size_t i_Frame)
+{
+	if (m_pMotionDock->isHidden())
+	{
+		m_pMotionDock->show();
+		// Behind what a window that is just shown does with its docks.
+		QTimer::singleShot(0, this,
+		    [this]
+		    {
+			    if (!m_pMotionDock->isFloating() && m_pMotionDock->height() < c_MotionHeight)
+				    resizeDocks({m_pMotionDock}, {c_MotionHeight}, Qt::Vertical);
+		    });
+	}
+	m_pMotionDock->raise();
+	Motion().Open(i_rPath, i_Frame);
+}
+
+void VStudioWindow::AskAndOpenTake()
+{
+	const QString folder =
+	    QString::fromStdString(UtilsFileSystem::ToUtf8(m_pContext->Preferences().Folder(c_pTakesFolderKey)));
+	const QString file = QFileDialog::getOpenFileName(this, tr("Choose a file"), folder,
+	    tr("Takes (*.bvh *.BVH *.fbx *.FBX)") + QStringLiteral(";;") + tr("All files (*)"));
+	if (!file.isEmpty())
+		OpenTake(file);
+}
+
+} // namespace StudioHost
