@@ -30,9 +30,9 @@ struct VMessageSettings
 
 /// All that messages of this system may have, so that a slip of the hand is told.
 inline constexpr const char* c_Categories[] = {"Command", "CoreGraphics", "FBXIO", "FilesystemWatcher", "Import",
-    "MotionIO", "QRTIO", "Qt", "QuickWidget", "RetargetSetup", "RigidBodyUtils", "Store", "SubjectCalibrationAlgo",
-    "SubjectCheck", "SubjectParametrisedUtils", "SubjectUtils", "System", "TakeIO", "Tessel", "VParameter",
-    "VSkinCache", "retarget", "retarget-studio"};
+    "Motion", "MotionIO", "QRTIO", "Qt", "QuickWidget", "RetargetSetup", "RigidBodyUtils", "Store",
+    "SubjectCalibrationAlgo", "SubjectCheck", "SubjectParametrisedUtils", "SubjectUtils", "System", "TakeIO", "Tessel",
+    "VParameter", "VSkinCache", "retarget", "retarget-studio"};
 
 /// Reads "CATEGORY=LEVEL" with a level of error, warning, information or detail. @return empty, or what is wrong
 /// with the text.

@@ -232,12 +232,11 @@ bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string_view& o_
 	{
 		const std::string_view element = UtilsRapidXml::Name(m_pElement);
 		const auto [it, bNew] = m_pGlobal->m_Ids.emplace(o_rText, element);
-		if (!bNew)
-		{
-			const bool bOtherKind = std::exchange(it->second, element) != element;
-			(m_pGlobal->m_bOwnFormsAreDetails && bOtherKind ? m_pGlobal->m_Details : m_pGlobal->m_Warnings)
-			    .Add("File contains duplicate ID : %1% ", o_rText);
-		}
+		const bool bOtherKind = std::exchange(it->second, element) != element;
+		if (bOtherKind && m_pGlobal->m_bOwnFormsAreDetails)
+			m_pGlobal->m_Details.Add("Elements of two kinds have the name %1%", o_rText);
+		else if (!bNew)
+			m_pGlobal->m_Warnings.Add("File contains duplicate ID : %1% ", o_rText);
 	}
 	else if (i_SchemaType == "xsd:IDREF" && !m_pGlobal->m_Ids.contains(o_rText))
 		m_pGlobal->m_Warnings.Add("File contains unknown IDREF : %1% ", o_rText);
