@@ -126,8 +126,8 @@ class VRebinding
 public:
 	VRebinding(const VSetup& i_rOld, const VSubjectParametrised& i_rFile, const VSubjectApplicationData& i_rFileData,
 	    double i_LeastScore)
-	    : m_rOld(i_rOld.m_Record.m_SubjectParametrised), m_rOldData(i_rOld.m_Record.m_SubjectApplicationData),
-	      m_rFile(i_rFile), m_rFileData(i_rFileData), m_OldStanding(m_rOld), m_FileStanding(m_rFile),
+	    : m_rOld(i_rOld.m_Record.m_SubjectParametrised), m_rFile(i_rFile), m_rFileData(i_rFileData),
+	      m_OldStanding(m_rOld), m_FileStanding(m_rFile),
 	      m_Matches(MatchSegments(Side(m_rOld), Side(m_rFile), i_LeastScore)), m_OldOf(m_rFile.m_Segments.size(), -1)
 	{
 		for (std::size_t i = 0; i < m_Matches.size(); ++i)
@@ -419,7 +419,6 @@ private:
 	}
 
 	const VSubjectParametrised& m_rOld;
-	const VSubjectApplicationData& m_rOldData;
 	const VSubjectParametrised& m_rFile;
 	const VSubjectApplicationData& m_rFileData;
 	const VStanding m_OldStanding;
