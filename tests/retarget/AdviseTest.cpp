@@ -28,7 +28,7 @@ protected:
 		return {{"verdict", "not there"}};
 	}
 
-	const VScratchFolder m_Folder;
+	const VScratchFolder m_Folder{};
 };
 
 TEST_F(Advise, JointsThatCouldGo)
