@@ -1,5 +1,7 @@
 #include "Rows.h"
 
+#include "math/NumberText.h"
+
 #include <algorithm>
 #include <cmath>
 #include <optional>
@@ -177,7 +179,9 @@ TEST(Solve, PlaysATakeThroughASubject)
 			std::istringstream values(line);
 			for (int i = 0; i < 5; ++i)
 				std::getline(values, value, ',');
-			worst = std::max(worst, std::stod(value));
+			double number = 0.0;
+			ASSERT_TRUE(NumberText::ScanWholeReal(value, number)) << value;
+			worst = std::max(worst, number);
 		}
 	EXPECT_NEAR(solved.at("targets")[0].at("max").get<double>(), worst, 1e-6);
 	const std::vector<std::string> solve{"solve", "c.qrr", "--take", take, "--source", "p.qrs"};

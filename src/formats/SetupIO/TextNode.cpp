@@ -1,6 +1,7 @@
 #include "SetupIO/TextNode.h"
 
 #include "SetupIO/Limits.h"
+#include "math/NumberText.h"
 
 #include <nlohmann/json.hpp>
 
@@ -73,7 +74,11 @@ public:
 	{
 		return Number(double(i_Value), std::to_string(i_Value));
 	}
-	bool number_float(number_float_t i_Value, const string_t& i_rText) override { return Number(i_Value, i_rText); }
+	/// The text that comes along has the decimal point of the process's language.
+	bool number_float(number_float_t i_Value, const string_t& /*i_rText*/) override
+	{
+		return Number(i_Value, NumberText::PrintShortest(i_Value));
+	}
 	bool string(string_t& i_rText) override
 	{
 		VTextNode* const pNode = Add(VTextNode::EText);
