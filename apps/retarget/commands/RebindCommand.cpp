@@ -3,6 +3,7 @@
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Mapping.h"
 #include "retarget/subject/Session.h"
+#include "retarget/text/InputFile.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/OutputFile.h"
 #include "retarget/text/Table.h"
