@@ -95,27 +95,24 @@ std::optional<std::pair<VVector3, VVector3>> BothEvaluated(
 constexpr double c_SameMillimetres = 1e-9;
 constexpr double c_SameDegrees = 1e-9;
 
+void Told(const VCase& i_rCase, const char* i_pId, const std::string& i_rWhat, const std::string& i_rHow)
+{
+	i_rCase.m_rChange.m_Id = i_pId;
+	i_rCase.m_rChange.m_Words = i_rWhat + (i_rHow.empty() ? " is written otherwise, with the same value" : i_rHow);
+}
+
 bool Moved(const VCase& i_rCase, double i_Millimetres, const char* i_pId, const std::string& i_rWhat)
 {
-	VSetupChange& rChange = i_rCase.m_rChange;
-	if (i_Millimetres <= c_SameMillimetres)
-		rChange.m_Words = i_rWhat + " is written otherwise, with the same value";
-	else
-		rChange.m_Words = i_rWhat + " moved by " + Millimetres(i_Millimetres);
-	rChange.m_Id = i_pId;
-	rChange.m_Millimetres = i_Millimetres;
+	Told(i_rCase, i_pId, i_rWhat,
+	    i_Millimetres <= c_SameMillimetres ? std::string() : " moved by " + Millimetres(i_Millimetres));
+	i_rCase.m_rChange.m_Millimetres = i_Millimetres;
 	return true;
 }
 
 bool Turned(const VCase& i_rCase, double i_Degrees, const char* i_pId, const std::string& i_rWhat)
 {
-	VSetupChange& rChange = i_rCase.m_rChange;
-	if (i_Degrees <= c_SameDegrees)
-		rChange.m_Words = i_rWhat + " is written otherwise, with the same value";
-	else
-		rChange.m_Words = i_rWhat + " turned by " + Degrees(i_Degrees);
-	rChange.m_Id = i_pId;
-	rChange.m_Degrees = i_Degrees;
+	Told(i_rCase, i_pId, i_rWhat, i_Degrees <= c_SameDegrees ? std::string() : " turned by " + Degrees(i_Degrees));
+	i_rCase.m_rChange.m_Degrees = i_Degrees;
 	return true;
 }
 
