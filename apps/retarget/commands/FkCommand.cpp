@@ -1,12 +1,11 @@
 #include "CommandLineText/Parsing.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Elements.h"
+#include "retarget/subject/RecordKinematics.h"
 #include "retarget/subject/SubjectFile.h"
 #include "retarget/text/Output.h"
 
 #include "ComputeSubjectFK/SegmentFKInterfaces.h"
-#include "CoreOrlexTypesUtils/SubjectKinematics.h"
-#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "CoreOrlexTypesUtils/joints/PoseVector.h"
 #include "DebugServices/GlobalLog.h"
 
@@ -17,10 +16,8 @@ namespace CommandLine
 namespace
 {
 
-using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectParametrised;
 using CoreOrlexTypes::VSubjectRecord;
-namespace SubjectParametrisedConverter = CoreOrlexTypesUtils::SubjectParametrisedConverter;
 
 struct VFkSettings
 {
@@ -28,33 +25,6 @@ struct VFkSettings
 	std::string m_Pose = "bind";
 	std::string m_State;
 };
-
-/// The subject in numbers, with kinematics; what has none is told and left out.
-CoreOrlexTypesUtils::VSubjectKinematics MakeKinematics(const std::string& i_rFile, const VSubjectRecord& i_rRecord)
-{
-	VSubject subject;
-	const auto failures = SubjectParametrisedConverter::ConvertAllOfSubject(i_rRecord.m_SubjectParametrised, subject);
-	const auto leaveOut = [&](std::size_t i_Index, const std::string& i_rReason)
-	{
-		const auto& rNamed = i_rRecord.m_SubjectApplicationData.m_Targets;
-		NVX_LOG(c_pCategory, NVX::ELogWarning, "Target #%1% \"%2%\" is left out: %3%", i_Index,
-		    i_Index < rNamed.size() ? rNamed[i_Index].m_Name : std::string(), i_rReason);
-	};
-	for (const auto& rFailure : failures)
-	{
-		leaveOut(rFailure.m_Index, "its state does not evaluate: " + rFailure.m_Reason);
-		subject.m_Targets[rFailure.m_Index].m_Type = VSubject::VTarget::EBadTargetType;
-	}
-	CoreOrlexTypesUtils::VSubjectKinematics kinematics(subject);
-	if (!kinematics.IsBuilt())
-		throw VCommandError(
-		    EBadInput, "\"" + i_rFile + "\" has segments that make no tree, or more than one: they have no kinematics");
-	for (std::size_t i = 0; i < subject.m_Targets.size(); ++i)
-		if (!kinematics.Target(i)
-		    && std::ranges::find(failures, i, &SubjectParametrisedConverter::VTargetFailure::m_Index) == failures.end())
-			leaveOut(i, "it does not fit its type, or has one without kinematics");
-	return kinematics;
-}
 
 std::vector<double> State(const VFkSettings& i_rSettings, const VSubjectParametrised& i_rSubject, std::size_t i_Size)
 {
@@ -100,7 +70,7 @@ EExitStatus ShowPoses(const VFkSettings& i_rSettings)
 {
 	const VSubjectRecord record = ReadSubjectFile(i_rSettings.m_File).m_Record;
 	const VSubjectParametrised& rParametrised = record.m_SubjectParametrised;
-	CoreOrlexTypesUtils::VSubjectKinematics kinematics = MakeKinematics(i_rSettings.m_File, record);
+	CoreOrlexTypesUtils::VSubjectKinematics kinematics = KinematicsOf(i_rSettings.m_File, record);
 	kinematics.Update(State(i_rSettings, rParametrised, kinematics.NumberOfStates()).data());
 
 	VJson segments = VJson::array();

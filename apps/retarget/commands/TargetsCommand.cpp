@@ -24,13 +24,6 @@ struct VTargetsSettings
 	bool m_bStates = false;
 };
 
-VJson ResidualToJson(const VResidual& i_rResidual)
-{
-	if (i_rResidual.m_Distance)
-		return *i_rResidual.m_Distance;
-	return i_rResidual.m_Angle ? VJson(AsDegrees(*i_rResidual.m_Angle)) : VJson();
-}
-
 /// A solver goes by the targets' own kinematics, the editing tools store offsets from the segments' poses.
 void TellDisagreement(const std::vector<VTargetLine>& i_rLines)
 {
@@ -44,31 +37,6 @@ void TellDisagreement(const std::vector<VTargetLine>& i_rLines)
 		    "the target's kinematics; post poses of segments and orientations of rotation targets do this",
 		    *worst, i_rLines[*worst].m_Name, ResidualText(residuals[*worst].m_Offset),
 		    ResidualText(residuals[*worst].m_Target));
-}
-
-VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
-{
-	VJson list = VJson::array();
-	for (const VTargetLine& rLine : i_rLines)
-	{
-		VJson item = VJson::object();
-		item["index"] = list.size();
-		item["name"] = rLine.m_Name;
-		item["type"] = rLine.m_Type;
-		item["source"] = rLine.m_Source;
-		item["target"] = rLine.m_Target;
-		item["weight"] = rLine.m_Weight;
-		item["state"] = rLine.m_State;
-		if (i_bResiduals)
-		{
-			const VResidual& rOffset = rLine.m_Residual.m_Offset;
-			item["distance"] = ResidualToJson({rOffset.m_Distance, {}});
-			item["angle"] = ResidualToJson({{}, rOffset.m_Angle});
-			item["targetResidual"] = ResidualToJson(rLine.m_Residual.m_Target);
-		}
-		list.push_back(std::move(item));
-	}
-	return list;
 }
 
 VTable LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals, bool i_bStates)

@@ -9,6 +9,17 @@
 
 namespace CommandLine
 {
+namespace
+{
+
+VJson ResidualToJson(const VResidual& i_rResidual)
+{
+	if (i_rResidual.m_Distance)
+		return *i_rResidual.m_Distance;
+	return i_rResidual.m_Angle ? VJson(AsDegrees(*i_rResidual.m_Angle)) : VJson();
+}
+
+} // namespace
 
 double AsDegrees(double i_Radians)
 {
@@ -55,6 +66,31 @@ std::string ShortType(std::string i_Type)
 	if (i_Type.starts_with("Local"))
 		i_Type.erase(0, 5);
 	return i_Type.substr(0, i_Type.find("To"));
+}
+
+VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)
+{
+	VJson list = VJson::array();
+	for (const VTargetLine& rLine : i_rLines)
+	{
+		VJson item = VJson::object();
+		item["index"] = list.size();
+		item["name"] = rLine.m_Name;
+		item["type"] = rLine.m_Type;
+		item["source"] = rLine.m_Source;
+		item["target"] = rLine.m_Target;
+		item["weight"] = rLine.m_Weight;
+		item["state"] = rLine.m_State;
+		if (i_bResiduals)
+		{
+			const VResidual& rOffset = rLine.m_Residual.m_Offset;
+			item["distance"] = ResidualToJson({rOffset.m_Distance, {}});
+			item["angle"] = ResidualToJson({{}, rOffset.m_Angle});
+			item["targetResidual"] = ResidualToJson(rLine.m_Residual.m_Target);
+		}
+		list.push_back(std::move(item));
+	}
+	return list;
 }
 
 } // namespace CommandLine

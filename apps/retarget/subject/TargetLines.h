@@ -1,6 +1,7 @@
 #pragma once
 
 #include "retarget/subject/Residuals.h"
+#include "retarget/text/Output.h"
 
 #include <string>
 #include <vector>
@@ -23,6 +24,9 @@ struct VTargetLine
 /// One for each target of the session.
 /// @param i_bResiduals needs a source.
 std::vector<VTargetLine> TargetLines(VSession& io_rSession, bool i_bResiduals);
+
+/// One object for each, with what "targets --json" shows.
+VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals);
 
 double AsDegrees(double i_Radians);
 

@@ -1,0 +1,160 @@
+#include "retarget/python/Call.h"
+#include "retarget/python/Files.h"
+#include "retarget/python/Records.h"
+#include "retarget/subject/RecordKinematics.h"
+
+#include "ComputeSubjectFK/SegmentFKInterfaces.h"
+#include "CoreOrlexTypesUtils/joints/PoseVector.h"
+
+#include <pybind11/numpy.h>
+#include <pybind11/stl.h>
+
+#include <limits>
+#include <mutex>
+
+namespace CommandLine::Python
+{
+namespace
+{
+
+namespace py = pybind11;
+using VNumbers = py::array_t<double, py::array::c_style | py::array::forcecast>;
+using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
+
+VNumbers ToArray(const std::vector<double>& i_rValues)
+{
+	return VNumbers(py::ssize_t(i_rValues.size()), i_rValues.data());
+}
+
+/// Threads of Python that use one wait for each other.
+class VPythonKinematics
+{
+public:
+	explicit VPythonKinematics(const VSubjectFile& i_rFile)
+	    : m_Subject(i_rFile.m_Record.m_SubjectParametrised),
+	      m_Kinematics(KinematicsOf(i_rFile.m_Record.m_SubjectParametrised.m_Name, i_rFile.m_Record))
+	{
+	}
+
+	std::size_t NumberOfStates() const { return m_Kinematics.NumberOfStates(); }
+
+	VNumbers Pose(std::vector<double> VJoint::*i_pStatistic) const
+	{
+		return ToArray(CoreOrlexTypesUtils::PoseVector(m_Subject, i_pStatistic));
+	}
+
+	/// Fills for each row of states what a function writes for a frame, c_Size values for each of i_Count things.
+	template <std::size_t c_Size, typename TFill>
+	VNumbers ForEachFrame(
+	    const VNumbers& i_rStates, std::size_t i_Count, std::vector<py::ssize_t> i_Shape, TFill i_Fill)
+	{
+		const bool bOne = i_rStates.ndim() == 1;
+		if (i_rStates.ndim() < 1 || i_rStates.ndim() > 2
+		    || std::size_t(i_rStates.shape(i_rStates.ndim() - 1)) != NumberOfStates())
+			throw py::value_error("states have a row of " + std::to_string(NumberOfStates())
+			    + " numbers for each frame, or are one such row");
+		const py::ssize_t frames = bOne ? 1 : i_rStates.shape(0);
+		if (!bOne)
+			i_Shape.insert(i_Shape.begin(), frames);
+		VNumbers result(i_Shape);
+		const double* pState = i_rStates.data();
+		double* pOut = result.mutable_data();
+		Call(
+		    [&]
+		    {
+			    const std::lock_guard lock(m_Mutex);
+			    for (py::ssize_t frame = 0; frame < frames; ++frame)
+			    {
+				    m_Kinematics.Update(pState);
+				    i_Fill(pOut);
+				    pState += NumberOfStates();
+				    pOut += c_Size * i_Count;
+			    }
+		    });
+		return result;
+	}
+
+	VNumbers Poses(const VNumbers& i_rStates)
+	{
+		const std::size_t count = m_Subject.m_Segments.size();
+		return ForEachFrame<16>(i_rStates, count, {py::ssize_t(count), 4, 4},
+		    [&](double* o_pOut)
+		    {
+			    for (std::size_t i = 0; i < count; ++i)
+			    {
+				    const Rotation::VPose<double> pose = m_Kinematics.Segment(i).SegmentPose();
+				    for (std::size_t row = 0; row < 3; ++row)
+				    {
+					    for (std::size_t column = 0; column < 3; ++column)
+						    *o_pOut++ = pose.R[3 * row + column];
+					    *o_pOut++ = pose.t[row];
+				    }
+				    for (const double value : {0.0, 0.0, 0.0, 1.0})
+					    *o_pOut++ = value;
+			    }
+		    });
+	}
+
+	VNumbers Markers(const VNumbers& i_rStates)
+	{
+		const std::size_t count = m_Subject.m_Markers.size();
+		return ForEachFrame<3>(i_rStates, count, {py::ssize_t(count), 3},
+		    [&](double* o_pOut)
+		    {
+			    m_Kinematics.ComputeMarkers(m_Positions, m_Valid);
+			    Write(m_Positions, o_pOut);
+		    });
+	}
+
+	VNumbers Rotations(const VNumbers& i_rStates)
+	{
+		const std::size_t count = m_Subject.m_Rotations.size();
+		return ForEachFrame<9>(i_rStates, count, {py::ssize_t(count), 3, 3},
+		    [&](double* o_pOut)
+		    {
+			    m_Kinematics.ComputeRotations(m_Orientations, m_Valid);
+			    Write(m_Orientations, o_pOut);
+		    });
+	}
+
+private:
+	template <typename TValue>
+	void Write(const std::vector<TValue>& i_rValues, double* o_pOut) const
+	{
+		for (std::size_t i = 0; i < i_rValues.size(); ++i)
+			for (const double value : i_rValues[i])
+				*o_pOut++ = m_Valid[i] ? value : std::numeric_limits<double>::quiet_NaN();
+	}
+
+	const CoreOrlexTypes::VSubjectParametrised m_Subject;
+	std::mutex m_Mutex;
+	CoreOrlexTypesUtils::VSubjectKinematics m_Kinematics;
+	std::vector<Rotation::VVector3> m_Positions;
+	std::vector<Rotation::VMatrix3> m_Orientations;
+	std::vector<bool> m_Valid;
+};
+
+} // namespace
+
+void DefineKinematics(py::module_& io_rModule)
+{
+	py::class_<VPythonKinematics, std::shared_ptr<VPythonKinematics>>(io_rModule, "Kinematics")
+	    .def(py::init(
+	        [](const py::tuple& i_rParts)
+	        {
+		        const VSubjectFile file = FileFrom(i_rParts);
+		        std::shared_ptr<VPythonKinematics> pKinematics;
+		        Call([&] { pKinematics = std::make_shared<VPythonKinematics>(file); });
+		        return pKinematics;
+	        }))
+	    .def_property_readonly("number_of_states", &VPythonKinematics::NumberOfStates)
+	    .def(
+	        "bind_pose", [](const VPythonKinematics& i_rKinematics) { return i_rKinematics.Pose(&VJoint::m_BindPose); })
+	    .def("mean_pose", [](const VPythonKinematics& i_rKinematics) { return i_rKinematics.Pose(&VJoint::m_Mean); })
+	    .def("t_pose", [](const VPythonKinematics& i_rKinematics) { return i_rKinematics.Pose(&VJoint::m_TPoseMean); })
+	    .def("poses", &VPythonKinematics::Poses)
+	    .def("markers", &VPythonKinematics::Markers)
+	    .def("rotations", &VPythonKinematics::Rotations);
+}
+
+} // namespace CommandLine::Python

@@ -1,0 +1,180 @@
+#include "retarget/python/Session.h"
+
+#include "retarget/python/Call.h"
+#include "retarget/python/Files.h"
+#include "retarget/python/Records.h"
+#include "retarget/subject/Aligning.h"
+#include "retarget/subject/Making.h"
+#include "retarget/subject/Session.h"
+#include "retarget/subject/TargetLines.h"
+
+#include <pybind11/stl.h>
+
+#include <mutex>
+
+namespace CommandLine::Python
+{
+namespace
+{
+
+namespace py = pybind11;
+
+/// Name and value of options of "create" and "edit", without dashes; nothing for one that takes none.
+using VEditPairs = std::vector<std::pair<std::string, std::optional<std::string>>>;
+
+/// Threads of Python that use one session wait for each other.
+class VPythonSession
+{
+public:
+	VPythonSession(const VMaking& i_rMaking, const VEditPairs& i_rEdits) : m_bOfFbx(!i_rMaking.m_Fbx.empty())
+	{
+		MakeSubject(m_Session, i_rMaking, ToEdits(i_rEdits));
+	}
+
+	void Edit(const VEditPairs& i_rEdits)
+	{
+		const VEdits edits = ToEdits(i_rEdits);
+		const std::lock_guard lock(m_Mutex);
+		// Of edits that failed before.
+		m_Session.m_WithoutPartner.clear();
+		ApplyEdits(m_Session, edits);
+		ReportPose(m_Session);
+	}
+
+	VSubjectFile Target()
+	{
+		const std::lock_guard lock(m_Mutex);
+		const auto values = m_Session.Document().TargetValues();
+		return {{*values.m_pParametrised, *values.m_pApplicationData}, m_Session.Document().GetTargetExtras()};
+	}
+
+	/// Empty without one.
+	VSubjectFile Source()
+	{
+		const std::lock_guard lock(m_Mutex);
+		const auto values = m_Session.Document().SourceValues();
+		VSubjectFile file;
+		if (values.m_pParametrised)
+			file.m_Record = {*values.m_pParametrised, *values.m_pApplicationData};
+		return file;
+	}
+
+	void Replace(const VSubjectFile& i_rFile)
+	{
+		const std::lock_guard lock(m_Mutex);
+		m_Session.Document().SetTargetSubject(
+		    i_rFile.m_Record.m_SubjectParametrised, i_rFile.m_Record.m_SubjectApplicationData, i_rFile.m_Extras);
+		m_Session.Settle();
+	}
+
+	void Save(const std::string& i_rPath)
+	{
+		const std::lock_guard lock(m_Mutex);
+		m_Session.Save(i_rPath);
+	}
+
+	/// As "targets --json" tells them.
+	std::string Targets()
+	{
+		const std::lock_guard lock(m_Mutex);
+		const bool bResiduals = m_Session.Document().SourceValues().m_pParametrised != nullptr;
+		return JsonText(LinesToJson(TargetLines(m_Session, bResiduals), bResiduals));
+	}
+
+	/// What edits have told.
+	std::string Report()
+	{
+		const std::lock_guard lock(m_Mutex);
+		return JsonText(m_Session.m_ReportJson);
+	}
+
+private:
+	VEdits ToEdits(const VEditPairs& i_rEdits) const
+	{
+		SetupIO::VSetup setup;
+		for (const auto& [rName, rValue] : i_rEdits)
+			setup.m_Edits.push_back({rName, rValue, {}, setup.m_Edits.size() + 1});
+		return EditsOf(setup, "edit", m_bOfFbx);
+	}
+
+	std::mutex m_Mutex;
+	VSession m_Session;
+	const bool m_bOfFbx;
+};
+
+py::object FromJson(const std::string& i_rText)
+{
+	return py::module_::import("json").attr("loads")(TextToPython(i_rText));
+}
+
+std::shared_ptr<VPythonSession> Make(const std::optional<std::string>& i_rFbx,
+    const std::optional<std::string>& i_rSubject, const std::optional<std::string>& i_rSource,
+    const std::optional<std::string>& i_rRoot, bool i_bScaleRootHeight, const VEditPairs& i_rEdits)
+{
+	const auto path = [](const std::optional<std::string>& i_rPath) { return i_rPath ? FilePath(*i_rPath) : ""; };
+	const VMaking making{
+	    path(i_rFbx), path(i_rSubject), path(i_rSource), i_rRoot, i_bScaleRootHeight ? c_pScaleRootHeight : "keep"};
+	std::shared_ptr<VPythonSession> pSession;
+	Call([&] { pSession = std::make_shared<VPythonSession>(making, i_rEdits); });
+	return pSession;
+}
+
+py::list EditKinds()
+{
+	py::list kinds;
+	for (const SetupIO::VEditForm& rForm : EditForms())
+		kinds.append(py::make_tuple(rForm.m_Name, rForm.m_bValue, rForm.m_Help));
+	return kinds;
+}
+
+} // namespace
+
+void DefineSession(py::module_& io_rModule)
+{
+	io_rModule.def("make", &Make);
+	io_rModule.def("edit_kinds", &EditKinds);
+	py::class_<VPythonSession, std::shared_ptr<VPythonSession>>(io_rModule, "Session")
+	    .def("edit",
+	        [](VPythonSession& io_rSession, const VEditPairs& i_rEdits) { Call([&] { io_rSession.Edit(i_rEdits); }); })
+	    .def("target",
+	        [](VPythonSession& io_rSession)
+	        {
+		        VSubjectFile file;
+		        Call([&] { file = io_rSession.Target(); });
+		        return ToPython(std::move(file));
+	        })
+	    .def("source",
+	        [](VPythonSession& io_rSession) -> py::object
+	        {
+		        VSubjectFile file;
+		        Call([&] { file = io_rSession.Source(); });
+		        if (file.m_Record.m_SubjectParametrised.m_Segments.empty())
+			        return py::none();
+		        return ToPython(std::move(file));
+	        })
+	    .def("replace",
+	        [](VPythonSession& io_rSession, const py::tuple& i_rParts)
+	        {
+		        const VSubjectFile file = FileFrom(i_rParts);
+		        Call([&] { io_rSession.Replace(file); });
+	        })
+	    .def("save",
+	        [](VPythonSession& io_rSession, const std::string& i_rPath)
+	        { Call([&] { io_rSession.Save(FilePath(i_rPath)); }); })
+	    .def("targets",
+	        [](VPythonSession& io_rSession)
+	        {
+		        std::string json;
+		        Call([&] { json = io_rSession.Targets(); });
+		        return FromJson(json);
+	        })
+	    .def("report",
+	        [](VPythonSession& io_rSession)
+	        {
+		        std::string json;
+		        Call([&] { json = io_rSession.Report(); });
+		        return FromJson(json);
+	        });
+}
+
+} // namespace CommandLine::Python

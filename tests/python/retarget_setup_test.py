@@ -1,0 +1,158 @@
+"""The Python package beside the command line and beside numbers by hand."""
+import ast
+import logging
+import math
+import os
+import pathlib
+import re
+import subprocess
+import threading
+
+import numpy as np
+import pytest
+
+import retarget_setup as rs
+
+ROOT = pathlib.Path(__file__).resolve().parents[2]
+FBX = ROOT / "demo/character.fbx"
+SOURCE = ROOT / "demo/performer.qrs"
+EDITS = ["match-file-pose", "auto", ("weight", "0=0.25"), "prune-joints", "update-targets"]
+
+
+def retarget(*words):
+    subprocess.run([os.environ["RETARGET"], "-q", *map(str, words)], check=True, capture_output=True)
+
+
+@pytest.fixture(scope="module")
+def saved(tmp_path_factory):
+    path = tmp_path_factory.mktemp("saved") / "kestrel.qrr"
+    rs.create(FBX, source=SOURCE, edits=EDITS).save(path)
+    return path
+
+
+def test_session_saves_what_the_command_line_saves(saved, tmp_path):
+    words = [word for edit in EDITS for word in ([f"--{edit}"] if isinstance(edit, str) else [f"--{edit[0]}", edit[1]])]
+    retarget("create", "--fbx", FBX, "--source", SOURCE, *words, "-o", tmp_path / "kestrel.qrr")
+    assert saved.read_bytes() == (tmp_path / "kestrel.qrr").read_bytes()
+
+
+@pytest.mark.parametrize("path", sorted((ROOT / "tests/data/qrt").glob("*.qrs")), ids=lambda path: path.name)
+def test_every_field_goes_through_python(path, tmp_path):
+    rs.read(path).write(tmp_path / "ours.qrs")
+    retarget("convert", path, tmp_path / "theirs.qrs")
+    assert (tmp_path / "ours.qrs").read_bytes() == (tmp_path / "theirs.qrs").read_bytes()
+
+
+def arm():
+    """A root of any pose, and an elbow 100 mm along its x, which is a hinge about z."""
+    free = rs.Joint(joint_type=rs.JointType.FREE, bind_pose=[0.0] * 6)
+    elbow = rs.Joint(joint_type="Ball", bind_pose=[0.0, 0.0, 0.5])
+    subject = rs.Subject(name="arm", segments=[
+        rs.Segment(name="upper", joint=free),
+        rs.Segment(name="lower", segment_index=1, parent_segment_index=0, tree_depth=1, joint=elbow,
+                   pre_translation=["100", "0", "0"])])
+    return rs.SkeletonFile(subject, rs.ApplicationData(segments=[rs.SegmentDrawing(), rs.SegmentDrawing()]))
+
+
+def test_poses_of_many_frames():
+    kinematics = rs.Kinematics(arm())
+    states = np.zeros((3, 9))
+    states[1, 3:6] = 10, 20, 30
+    states[2, 2] = math.pi / 2
+    states[2, 8] = math.pi / 2
+    poses = kinematics.poses(states)
+    assert poses.shape == (3, 2, 4, 4)
+    assert poses[:, 1, :3, 3] == pytest.approx(np.array([[100, 0, 0], [110, 20, 30], [0, 100, 0]]), abs=1e-12)
+    half_turn = np.diag([-1.0, -1.0, 1.0])
+    assert poses[2, 1, :3, :3] == pytest.approx(half_turn, abs=1e-12)
+    assert kinematics.poses(states[2]) == pytest.approx(poses[2])
+    assert kinematics.bind_pose() == pytest.approx([0, 0, 0, 0, 0, 0, 0, 0, 0.5])
+
+
+def broken(change):
+    file = arm()
+    change(file)
+    return file
+
+
+@pytest.mark.parametrize("kind, words, call", [
+    (rs.Error, "could not be read as a skeleton file", lambda path: rs.read(path / "none.qrs")),
+    (rs.Error, "File is not an FBX file", lambda path: rs.create(ROOT / "README.md")),
+    (rs.Error, 'no source segment "Nobody"', lambda path: rs.create(FBX, SOURCE, edits=[("position", "Nobody:skull")])),
+    (rs.Error, 'there is no edit "--fly"', lambda path: rs.create(FBX, edits=["fly"])),
+    (rs.Error, "make no tree", lambda path: rs.Kinematics(rs.SkeletonFile())),
+    (rs.Error, "none", lambda path: arm().write(path / "none" / "arm.qrs")),
+    (ValueError, "states have a row of 9", lambda path: rs.Kinematics(arm()).poses([[1, 2, 3]])),
+    (ValueError, "the versions are 1.0", lambda path: arm().write(path / "arm.qrs", version="9.9")),
+    (ValueError, "subject has 2 segments, its application data 0", lambda path: rs.SkeletonFile(arm().subject).check()),
+    (TypeError, r"segments\[1\].joint.mean\[1\] is no float",
+     lambda path: broken(lambda file: setattr(file.subject.segments[1].joint, "mean", [1, "2"])).check()),
+    (ValueError, r"segments\[0\].pre_rotation has 2 items, not 3",
+     lambda path: broken(lambda file: setattr(file.subject.segments[0], "pre_rotation", ["0", "0"])).check()),
+    (ValueError, r"segments\[0\].segment_index is not from 0",
+     lambda path: broken(lambda file: setattr(file.subject.segments[0], "segment_index", -1)).check()),
+    (ValueError, "joint_type is no JointType",
+     lambda path: broken(lambda file: setattr(file.subject.segments[0].joint, "joint_type", "Rubber")).check()),
+    (TypeError, "segments is a text", lambda path: broken(lambda file: setattr(file.subject, "segments", "")).check()),
+    (AttributeError, "bindpose", lambda path: setattr(arm().subject.segments[0].joint, "bindpose", [])),
+])
+def test_what_cannot_be_done_says_why_and_writes_nothing(kind, words, call, tmp_path):
+    with pytest.raises(kind, match=words):
+        call(tmp_path)
+    assert list(tmp_path.iterdir()) == []
+
+
+def test_findings_and_messages(caplog):
+    file = arm()
+    before = file.check()
+    file.subject.segments[1].parent_segment_index = 7
+    assert {finding.name for finding in file.check() if finding not in before} == {"lower"}
+    with caplog.at_level(logging.WARNING, "retarget_setup"):
+        rs.create(FBX)
+    assert any(record.name == "retarget_setup.retarget" and "--match-file-pose" in record.message
+               for record in caplog.records)
+
+
+def test_a_changed_subject_goes_back_into_the_session(saved):
+    session = rs.load(saved, source=SOURCE)
+    file = session.target
+    file.subject.targets[0].weight = np.float32(0.75)
+    session.target = file
+    assert session.targets()[0]["weight"] == 0.75
+    assert [change.id for change in rs.compare(rs.read(saved), session.target)] == ["weight"]
+    assert session.source.subject.segments[0].name == rs.read(SOURCE).subject.segments[0].name
+
+
+def test_threads_share_a_session(saved):
+    session = rs.load(saved)
+    counts = []
+
+    def work():
+        for _ in range(10):
+            session.edit("weight", "0=0.5")
+            counts.append(len(session.target.subject.targets))
+
+    threads = [threading.Thread(target=work) for _ in range(4)]
+    for thread in threads:
+        thread.start()
+    for thread in threads:
+        thread.join()
+    assert counts == [len(session.targets())] * 40
+
+
+def test_types_name_what_there_is():
+    stub = ast.parse((pathlib.Path(rs.__file__).parent / "__init__.pyi").read_text(encoding="utf8"))
+    named = {getattr(node, "name", None) or node.target.id for node in stub.body
+             if isinstance(node, (ast.ClassDef, ast.FunctionDef, ast.AnnAssign))}
+    assert named >= set(rs.__all__)
+
+
+def test_the_documents_example(tmp_path, monkeypatch):
+    for file in (FBX, SOURCE):
+        (tmp_path / file.name).symlink_to(file)
+    monkeypatch.chdir(tmp_path)
+    text = (ROOT / "docs/python.md").read_text(encoding="utf8")
+    scope = {}
+    for code in re.findall(r"```python\n(.*?)```", text, re.S):
+        exec(compile(code, "docs/python.md", "exec"), scope)  # noqa: S102
+    assert (tmp_path / "kestrel.qrr").exists() and scope["worst"] < 1
