@@ -72,12 +72,12 @@ template <typename T>
 struct VItemOf
 {
 	using Type = void;
-	static constexpr std::size_t c_Size = 0;
 };
 template <typename T>
 struct VItemOf<std::vector<T>>
 {
 	using Type = T;
+	/// Any number of items.
 	static constexpr std::size_t c_Size = 0;
 };
 template <typename T, std::size_t N>
@@ -87,7 +87,7 @@ struct VItemOf<std::array<T, N>>
 	static constexpr std::size_t c_Size = N;
 };
 template <typename T>
-concept CList = !std::is_void_v<typename VItemOf<T>::Type>;
+inline constexpr bool c_bList = !std::is_same_v<typename VItemOf<T>::Type, void>;
 
 template <typename T>
 std::string TypeName()
@@ -96,14 +96,16 @@ std::string TypeName()
 		return c_RecordName<T>;
 	else if constexpr (CEnumeration<T>)
 		return EnumerationName(c_Enumeration<T>.Name);
-	else if constexpr (CList<T>)
+	else if constexpr (c_bList<T>)
 		return "list[" + TypeName<typename VItemOf<T>::Type>() + "]";
 	else if constexpr (std::is_same_v<T, bool>)
 		return "bool";
 	else if constexpr (std::is_same_v<T, std::string>)
 		return "str";
+	else if constexpr (std::is_integral_v<T>)
+		return "int";
 	else
-		return std::is_integral_v<T> ? "int" : "float";
+		return "float";
 }
 
 template <typename T>
@@ -124,7 +126,7 @@ py::object ToObject(const T& i_rValue)
 			throw py::value_error("a " + TypeName<T>() + " of " + std::to_string(int(i_rValue)) + " has no name");
 		return Classes()[TypeName<T>().c_str()](TextToPython(name));
 	}
-	else if constexpr (CList<T>)
+	else if constexpr (c_bList<T>)
 	{
 		py::list list;
 		for (const auto& rItem : i_rValue)
@@ -249,7 +251,7 @@ void FromObject(const py::handle& i_rObject, T& o_rValue)
 	{
 		RecordFromObject(i_rObject, o_rValue);
 	}
-	else if constexpr (CList<T>)
+	else if constexpr (c_bList<T>)
 	{
 		ListFromObject(i_rObject, o_rValue);
 	}
@@ -305,7 +307,7 @@ T ValueFrom(const py::handle& i_rObject)
 template <typename T, typename TVisitor>
 void Describe(TVisitor& io_rVisitor)
 {
-	if constexpr (CList<T>)
+	if constexpr (c_bList<T>)
 		Describe<typename VItemOf<T>::Type>(io_rVisitor);
 	else if constexpr (CRecord<T> || CEnumeration<T>)
 		io_rVisitor.template Visit<T>();
@@ -347,7 +349,7 @@ struct VRecords : VSeen
 			return py::none();
 		else if constexpr (CEnumeration<T>)
 			return TextToPython(EnumeratorName(i_rValue));
-		else if constexpr (CList<T>)
+		else if constexpr (c_bList<T>)
 			return i_rValue.empty() ? py::list() : ToObject(i_rValue);
 		else
 			return ToObject(i_rValue);
