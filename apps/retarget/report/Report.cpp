@@ -40,19 +40,24 @@ std::string NameOfFile(const std::string& i_rPath)
 	                                    : UtilsFileSystem::ToUtf8(UtilsFileSystem::PathFromUtf8(i_rPath).filename());
 }
 
+std::string DigestOf(const std::string& i_rPath)
+{
+	if (i_rPath == c_pStandardStream)
+		return "not known, of a stream";
+	std::string error;
+	const std::optional<std::string> digest = FileDigest::Sha256(UtilsFileSystem::PathFromUtf8(i_rPath), error);
+	if (!digest)
+		throw VCommandError(EBadInput, error);
+	return *digest;
+}
+
 void AddFiles(const VReportSettings& i_rSettings, VPage& io_rPage)
 {
 	VRows rows;
 	for (const auto& [pWhat, pPath] : {std::pair{"Retarget subject", &i_rSettings.m_In},
 	         {"Performer", &i_rSettings.m_Source}, {"Character", &i_rSettings.m_Fbx}})
-	{
-		std::string error;
 		if (!pPath->empty())
-			rows.push_back({pWhat, NameOfFile(*pPath),
-			    *pPath == c_pStandardStream
-			        ? "not known, of a stream"
-			        : FileDigest::Sha256(UtilsFileSystem::PathFromUtf8(*pPath), error).value_or(error)});
-	}
+			rows.push_back({pWhat, NameOfFile(*pPath), DigestOf(*pPath)});
 	io_rPage.Heading("Files");
 	io_rPage.Table({"What", "File", "SHA-256"}, rows);
 }

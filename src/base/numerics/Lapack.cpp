@@ -42,6 +42,11 @@ TFunction* Routine(const char* i_pName)
 
 } // namespace
 
+bool IsLoaded()
+{
+	return Library().is_loaded();
+}
+
 int Dgesvd(int i_Rows, int i_Columns, double* io_pM, double* o_pW, double* o_pU, double* o_pVt, double* o_pWork,
     int i_WorkSize)
 {

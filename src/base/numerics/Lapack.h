@@ -11,6 +11,9 @@ namespace Lapack
 /// Told once in the log category "System".
 inline constexpr int c_NotLoaded = -1000;
 
+/// Loads LAPACK if it is not there yet. Without it nothing can be said about a matrix.
+bool IsLoaded();
+
 /// Doubles of work space that Dgesvd needs.
 constexpr std::size_t DgesvdWork(std::size_t i_Rows, std::size_t i_Columns)
 {

@@ -1,6 +1,7 @@
 #include "numerics/MatrixValidity.h"
 
 #include "numerics/AllFinite.h"
+#include "numerics/Lapack.h"
 #include "numerics/fnl_symmetric_eigensystem.h"
 
 #include <algorithm>
@@ -14,6 +15,12 @@ namespace
 bool IsZero(std::span<const double> i_Matrix)
 {
 	return std::ranges::all_of(i_Matrix, [](double i_Value) { return i_Value == 0.0; });
+}
+
+/// Where LAPACK is missing, which is told once, no matrix is to blame.
+bool HasKnownEigenvalues(std::span<const double> i_Matrix)
+{
+	return !IsZero(i_Matrix) && Lapack::IsLoaded();
 }
 
 /// What must hold before the eigenvalues are asked for.
@@ -61,7 +68,7 @@ template <std::size_t t_Size>
 EFault FaultAsSemidefinite(std::span<const double, t_Size * t_Size> i_Matrix)
 {
 	const EFault fault = FaultOfEntries(i_Matrix, t_Size);
-	if (fault != EFault::ENone || IsZero(i_Matrix))
+	if (fault != EFault::ENone || !HasKnownEigenvalues(i_Matrix))
 		return fault;
 	return SmallestEigenvalue<t_Size>(i_Matrix) >= 0.0 ? EFault::ENone : EFault::EEigenvalue;
 }
@@ -95,7 +102,7 @@ template void TakeOffRounding<6>(std::span<double, 36> io_Matrix);
 EFault FaultAsDefinite(std::span<const double> i_Matrix, std::size_t i_Size)
 {
 	const EFault fault = FaultOfEntries(i_Matrix, i_Size);
-	if (fault != EFault::ENone || IsZero(i_Matrix))
+	if (fault != EFault::ENone || !HasKnownEigenvalues(i_Matrix))
 		return fault;
 	return SmallestEigenvalue(i_Matrix, i_Size) > 0.0 ? EFault::ENone : EFault::EEigenvalue;
 }

@@ -4,7 +4,8 @@
 
 void fnl_symmetric_eigensystem_report(int i_Error)
 {
-	std::cerr << "fnl_symmetric_eigensystem: ierr = " + std::to_string(i_Error) + "\n";
+	if (i_Error != Lapack::c_NotLoaded)
+		std::cerr << "fnl_symmetric_eigensystem: ierr = " + std::to_string(i_Error) + "\n";
 }
 
 bool fnl_symmetric_eigensystem_compute(

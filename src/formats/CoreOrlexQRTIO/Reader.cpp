@@ -11,6 +11,8 @@
 
 #include <boost/format.hpp>
 
+#include <new>
+
 namespace CoreOrlexQRTIO
 {
 
@@ -32,6 +34,8 @@ void ReadTree(UtilsRapidXml::VDocument& i_rDocument, bool i_bOwnFormsAreDetails,
 		pGlobal->m_bOwnFormsAreDetails = i_bOwnFormsAreDetails;
 		FormatDocument(root, io_rReading);
 	}
+	if (pGlobal->m_bOutOfMemory)
+		throw std::bad_alloc();
 	o_rErrors = pGlobal->m_Errors.GetTexts();
 	o_rWarnings = pGlobal->m_Warnings.GetTexts();
 	for (const std::string& rDetail : pGlobal->m_Details.GetTexts())

@@ -3,6 +3,7 @@
 #include <rapidxml/rapidxml.hpp>
 
 #include <algorithm>
+#include <new>
 #include <set>
 
 namespace UtilsRapidXml
@@ -75,6 +76,22 @@ VReaderNode::VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pG
 
 VReaderNode::~VReaderNode()
 {
+	try
+	{
+		TellIgnored();
+		m_pNotes->m_Pending.clear();
+		m_pNotes->m_RecognisedChildren.clear();
+		m_pNotes->m_RecognisedAttributes.clear();
+		m_pGlobal->m_SpareNotes.push_back(std::move(m_pNotes));
+	}
+	catch (const std::bad_alloc&)
+	{
+		m_pGlobal->m_bOutOfMemory = true;
+	}
+}
+
+void VReaderNode::TellIgnored()
+{
 	std::set<std::string_view> told;
 	for (const VXmlNode* pChild = m_pElement->first_node(); pChild; pChild = pChild->next_sibling())
 	{
@@ -94,10 +111,6 @@ VReaderNode::~VReaderNode()
 			        : m_pGlobal->m_Warnings)
 			    .Add("Ignoring unrecognised attribute: %1%",
 			        [&] { return (Path(m_pElement) += '/') += UtilsRapidXml::Name(pAttribute); });
-	m_pNotes->m_Pending.clear();
-	m_pNotes->m_RecognisedChildren.clear();
-	m_pNotes->m_RecognisedAttributes.clear();
-	m_pGlobal->m_SpareNotes.push_back(std::move(m_pNotes));
 }
 
 void VReaderNode::DeclareElement(std::string_view i_Name, std::string_view, std::uint32_t i_MinimumCount,

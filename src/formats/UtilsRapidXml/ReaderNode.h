@@ -56,6 +56,9 @@ public:
 		VMessages m_Details;
 		bool m_bOwnFormsAreDetails = false;
 		bool m_bStrictOrder = false;
+		/// What a node was to tell when it went is missing: the reader is to throw std::bad_alloc, which a node could
+		/// not.
+		bool m_bOutOfMemory = false;
 		/// The values of all xsd:ID attributes read so far, with the names of the elements that had them last; both
 		/// point into the document.
 		std::unordered_map<std::string_view, std::string_view> m_Ids;
@@ -86,6 +89,7 @@ public:
 private:
 	VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pGlobal);
 
+	void TellIgnored();
 	void Match(const VDeclaration& i_rDeclaration, bool i_bChoice, std::string& io_rChosen);
 
 	VXmlNode* m_pElement;

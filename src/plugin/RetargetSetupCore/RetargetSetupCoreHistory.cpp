@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <iterator>
+#include <new>
 #include <utility>
 
 using RetargetSetup::c_LogCategory;
@@ -32,11 +33,19 @@ VRetargetSetupCore::VStep::~VStep()
 		m_rDocument.m_bInStep = false;
 	if (!m_Before || HoldTheSame(*m_Before, m_rDocument.m_Target))
 		return;
-	const bool bFits = m_rDocument.m_History->Add(m_Edit, std::move(*m_Before), m_rDocument.m_Target);
-	if (!bFits && !std::exchange(m_rDocument.m_bForgotTold, true))
-		NVX_LOG(c_LogCategory, NVX::ELogInformation,
-		    "The oldest edits can no longer be undone: what is kept for that has reached %1% MiB",
-		    m_rDocument.m_History->MostBytes() >> 20);
+	try
+	{
+		const bool bFits = m_rDocument.m_History->Add(m_Edit, std::move(*m_Before), m_rDocument.m_Target);
+		if (!bFits && !std::exchange(m_rDocument.m_bForgotTold, true))
+			NVX_LOG(c_LogCategory, NVX::ELogInformation,
+			    "The oldest edits can no longer be undone: what is kept for that has reached %1% MiB",
+			    m_rDocument.m_History->MostBytes() >> 20);
+	}
+	catch (const std::bad_alloc&)
+	{
+		// Without this edit the way back would lead to what never was.
+		m_rDocument.m_History->Clear();
+	}
 }
 
 void VRetargetSetupCore::KeepHistory(
