@@ -85,6 +85,22 @@ TEST(InputStreamSeekable, FailsWithoutAFile)
 	EXPECT_EQ(log.Take(), (VTexts{missing, missing, directory, directory}));
 }
 
+TEST(InputStreamSeekable, FailsWhereTheFileWasCutShort)
+{
+	const VTestFolder folder;
+	const std::string bytes = Pattern(100000);
+	Put(folder / "a", bytes);
+	VMemoryMappedInputStreamVirtual mapped(folder / "a");
+	std::string read(1000, '\0');
+	ASSERT_EQ(mapped.Read(read.data(), read.size()), read.size());
+	boost::filesystem::resize_file(folder / "a", 4096);
+	ASSERT_EQ(mapped.Read(read.data(), read.size()), read.size());
+	EXPECT_EQ(read, bytes.substr(1000, 1000));
+	ASSERT_TRUE(mapped.Seek(50000));
+	EXPECT_EQ(mapped.Read(read.data(), read.size()), 0u);
+	EXPECT_FALSE(mapped.IsGood());
+}
+
 TEST(MemoryMappedFile, CountsSwapsAndPages)
 {
 	const VTestFolder folder;

@@ -4,7 +4,6 @@
 #include "UtilsFileSystem/Files.h"
 
 #include <algorithm>
-#include <cstring>
 
 namespace UtilsFileSystem
 {
@@ -98,9 +97,9 @@ std::size_t VMemoryMappedInputStreamVirtual::Read(void* o_pBytes, std::size_t i_
 	while (m_bGood && read < i_Count && m_Position < GetSize())
 	{
 		const std::string_view view = m_File.View(m_Position);
-		const std::size_t part = std::min(view.size(), i_Count - read);
-		m_bGood = part > 0;
-		std::memcpy(static_cast<char*>(o_pBytes) + read, view.data(), part);
+		const std::size_t wanted = std::min(view.size(), i_Count - read);
+		const std::size_t part = Platform::CopyFromView(view.data(), wanted, static_cast<char*>(o_pBytes) + read);
+		m_bGood = part > 0 && part == wanted;
 		read += part;
 		m_Position += part;
 	}

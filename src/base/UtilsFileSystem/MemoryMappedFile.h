@@ -46,7 +46,8 @@ public:
 	explicit VMemoryMappedInputFile(const boost::filesystem::path& i_rPath, std::size_t i_WindowBytes = 64u << 20);
 
 	/// The bytes from a position to the end of the window that holds it; empty beyond the end or on failure. Valid
-	/// until the next call.
+	/// until the next call. If another program cuts the file short, touching what is gone ends the process: where that
+	/// may be, VMemoryMappedInputStreamVirtual reads.
 	std::string_view View(std::uint64_t i_Position);
 
 	/// How often the window was moved, the first time included.
@@ -68,7 +69,8 @@ public:
 	char* GetData() { return m_pView; }
 };
 
-/// A file of any size through a sliding window. At its end the log tells how often the window was moved.
+/// A file of any size through a sliding window. At its end the log tells how often the window was moved. If another
+/// program cuts the file short, a read beyond what is left fails.
 class VMemoryMappedInputStreamVirtual final : public NVX::IInputStreamSeekable
 {
 public:

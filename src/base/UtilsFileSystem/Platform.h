@@ -49,6 +49,10 @@ int OpenMapped(const boost::filesystem::path& i_rPath, bool i_bWrite, std::uint6
 /// @param i_Offset a multiple of GetMappingGranularity(). @param i_Length more than 0 and within the file.
 /// @return null on failure.
 void* MapView(const VMapped& i_rMapped, std::uint64_t i_Offset, std::size_t i_Length);
+/// Copies bytes of a view. The file may have been cut short by another program since, where touching them would end the
+/// process.
+/// @return how many could be copied.
+std::size_t CopyFromView(const char* i_pBytes, std::size_t i_Count, void* o_pBytes);
 void UnmapView(void* i_pView, std::size_t i_Length);
 void CloseMapped(VMapped& io_rMapped);
 std::size_t GetMappingGranularity();

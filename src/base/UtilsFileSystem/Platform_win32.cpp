@@ -13,6 +13,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstdlib>
+#include <cstring>
 #include <iterator>
 #include <utility>
 
@@ -245,6 +246,13 @@ void* MapView(const VMapped& i_rMapped, std::uint64_t i_Offset, std::size_t i_Le
 {
 	return ::MapViewOfFile(reinterpret_cast<HANDLE>(i_rMapped.m_Mapping),
 	    i_rMapped.m_bWrite ? FILE_MAP_WRITE : FILE_MAP_READ, DWORD(i_Offset >> 32), DWORD(i_Offset), i_Length);
+}
+
+std::size_t CopyFromView(const char* i_pBytes, std::size_t i_Count, void* o_pBytes)
+{
+	// A file that is mapped cannot be cut short here.
+	std::memcpy(o_pBytes, i_pBytes, i_Count);
+	return i_Count;
 }
 
 void UnmapView(void* i_pView, std::size_t)
