@@ -1,6 +1,7 @@
 #include "CommandLineText/Messages.h"
 
 #include "CommandLineText/Suggest.h"
+#include "CommandLineText/VisibleText.h"
 
 #include <nlohmann/json.hpp>
 
@@ -171,10 +172,7 @@ std::string OneLine(std::string i_Message)
 {
 	while (!i_Message.empty() && (i_Message.back() == '\n' || i_Message.back() == '\r'))
 		i_Message.pop_back();
-	for (char& rByte : i_Message)
-		if (static_cast<unsigned char>(rByte) < 0x20 || rByte == 0x7F)
-			rByte = ' ';
-	return i_Message;
+	return VisibleLine(i_Message);
 }
 
 void PrintMessage(const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)

@@ -40,6 +40,16 @@ TEST(Report, TellsTheSetUp)
 	         "Range of motion: ", "Pictures were not asked for"})
 		EXPECT_NE(page.find(pShown), std::string::npos) << pShown;
 	EXPECT_EQ(folder.Run(report).m_Out, page);
+
+	// Nor does any of it reach a terminal.
+	for (const std::vector<std::string>& rCommand : std::vector<std::vector<std::string>>{{"segments", file},
+	         {"targets", file, "--source", c_Performer}, {"check", file}, {"dump", file}, {"fk", file, "--json"},
+	         {"diff", "x.qrr", file, "-vv"}, {"edit", file, "--weight", "7=1", "-o", file}})
+	{
+		const VRun run = folder.Run(rCommand);
+		for (const std::string& rText : {run.m_Out, run.m_Err})
+			EXPECT_EQ(rText.find("\xE2\x80\xAE"), std::string::npos) << rCommand.front() << ": " << rText;
+	}
 }
 
 TEST(Report, WrongInput)

@@ -365,6 +365,7 @@ TEST_F(Window, TellsWhatTheMouseDoes)
 			    auto* const pBox = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
 			    ASSERT_TRUE(pBox);
 			    text = pBox->text();
+			    EXPECT_EQ(pBox->textFormat(), Qt::RichText);
 			    pBox->button(QMessageBox::Close)->click();
 		    });
 		m_pWindow->findChild<QAction*>("MouseAndKeys")->trigger();
@@ -541,6 +542,8 @@ TEST_F(Window, AFailedSaveIsShown)
 	Action("Save").trigger();
 	ASSERT_TRUE(failure());
 	EXPECT_TRUE(failure()->informativeText().contains("it is a folder")) << failure()->informativeText().toStdString();
+	for (const QLabel* const pLabel : failure()->findChildren<QLabel*>())
+		EXPECT_EQ(pLabel->textFormat(), Qt::PlainText) << "names of files may look like markup";
 	delete failure();
 	m_pWindow->RetargetPanel()->SaveTo(Path("none/b.qrr"));
 	ASSERT_TRUE(failure());

@@ -1,11 +1,11 @@
 #include "retarget/report/Page.h"
 
+#include "CommandLineText/VisibleText.h"
+
 #include <boost/archive/iterators/base64_from_binary.hpp>
 #include <boost/archive/iterators/transform_width.hpp>
 
 #include <algorithm>
-#include <array>
-#include <cstdint>
 
 namespace CommandLine
 {
@@ -28,56 +28,6 @@ figure { margin: 0; width: calc(50% - 0.5em); break-inside: avoid; }
 img { width: 100%; border: 1px solid #ccc; }
 @media print { body { margin: 0; max-width: none; font-size: 9pt; } }
 )";
-
-/// Characters that nobody sees, or that change how their neighbours are shown.
-bool IsUnseen(std::uint32_t i_Character)
-{
-	struct VSpan
-	{
-		std::uint32_t m_First;
-		std::uint32_t m_Last;
-	};
-	constexpr std::array c_Spans{VSpan{0x00, 0x1F}, VSpan{0x7F, 0x9F}, VSpan{0xAD, 0xAD}, VSpan{0x61C, 0x61C},
-	    VSpan{0x115F, 0x1160}, VSpan{0x180E, 0x180E}, VSpan{0x200B, 0x200F}, VSpan{0x2028, 0x202E},
-	    VSpan{0x2060, 0x206F}, VSpan{0x3164, 0x3164}, VSpan{0xFE00, 0xFE0F}, VSpan{0xFEFF, 0xFEFF},
-	    VSpan{0xFFF0, 0xFFFB}, VSpan{0xFFFE, 0xFFFF}, VSpan{0xE0000, 0xE0FFF}};
-	return std::ranges::any_of(
-	    c_Spans, [&](const VSpan& i_rSpan) { return i_Character >= i_rSpan.m_First && i_Character <= i_rSpan.m_Last; });
-}
-
-/// The character at the start of a text, and how many bytes it takes; 0 bytes for what is no UTF-8.
-std::size_t Decode(std::string_view i_Text, std::uint32_t& o_rCharacter)
-{
-	const auto byte = [&](std::size_t i_Index) { return std::uint32_t(std::uint8_t(i_Text[i_Index])); };
-	const std::uint32_t first = byte(0);
-	const std::size_t size = first < 0x80 ? 1
-	    : first < 0xC2                    ? 0
-	    : first < 0xE0                    ? 2
-	    : first < 0xF0                    ? 3
-	    : first < 0xF5                    ? 4
-	                                      : 0;
-	if (size == 0 || size > i_Text.size())
-		return 0;
-	o_rCharacter = size == 1 ? first : first & (0x7Fu >> size);
-	for (std::size_t i = 1; i < size; ++i)
-	{
-		if ((byte(i) & 0xC0u) != 0x80u)
-			return 0;
-		o_rCharacter = o_rCharacter << 6 | (byte(i) & 0x3Fu);
-	}
-	constexpr std::array<std::uint32_t, 5> c_Least{0, 0, 0x80, 0x800, 0x10000};
-	const bool bSurrogate = o_rCharacter >= 0xD800 && o_rCharacter <= 0xDFFF;
-	return o_rCharacter < c_Least[size] || o_rCharacter > 0x10FFFF || bSurrogate ? 0 : size;
-}
-
-std::string Number(std::uint32_t i_Value, const char* i_pBegin)
-{
-	std::string digits;
-	for (int shift = 20; shift >= 0; shift -= 4)
-		if (const std::uint32_t digit = i_Value >> shift & 15u; digit > 0 || !digits.empty() || shift < 8)
-			digits += "0123456789ABCDEF"[digit];
-	return "[" + std::string(i_pBegin) + digits + "]";
-}
 
 std::string Base64(std::string_view i_Bytes)
 {
@@ -102,28 +52,13 @@ std::string Cell(const std::string& i_rText)
 std::string EscapedForHtml(std::string_view i_Text)
 {
 	std::string text;
-	while (!i_Text.empty())
-	{
-		std::uint32_t character = 0;
-		const std::size_t size = Decode(i_Text, character);
-		if (size == 0)
-			text += Number(std::uint8_t(i_Text.front()), "0x");
-		else if (IsUnseen(character))
-			text += Number(character, "U+");
-		else if (character == '&')
-			text += "&amp;";
-		else if (character == '<')
-			text += "&lt;";
-		else if (character == '>')
-			text += "&gt;";
-		else if (character == '"')
-			text += "&quot;";
-		else if (character == '\'')
-			text += "&#39;";
-		else
-			text += i_Text.substr(0, size);
-		i_Text.remove_prefix(std::max<std::size_t>(size, 1));
-	}
+	for (const char byte : VisibleText(i_Text))
+		text += byte == '&' ? "&amp;"
+		    : byte == '<'   ? "&lt;"
+		    : byte == '>'   ? "&gt;"
+		    : byte == '"'   ? "&quot;"
+		    : byte == '\''  ? "&#39;"
+		                    : std::string(1, byte);
 	return text;
 }
 

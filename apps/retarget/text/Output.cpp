@@ -2,6 +2,7 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/VisibleText.h"
 
 #include <cerrno>
 #include <cstdio>
@@ -76,7 +77,7 @@ std::string JsonText(const VJson& i_rValue)
 {
 	std::string text;
 	Append(text, i_rValue, 0);
-	return text;
+	return VisibleJson(text);
 }
 
 void PrintResult(const VJson& i_rJson, std::string_view i_Text)
@@ -94,11 +95,7 @@ void PrintJson(const VJson& i_rValue)
 
 std::string Printable(std::string_view i_Text)
 {
-	std::string text(i_Text);
-	for (char& rByte : text)
-		if (static_cast<unsigned char>(rByte) < 0x20 || rByte == 0x7F)
-			rByte = ' ';
-	return text;
+	return VisibleLine(i_Text);
 }
 
 } // namespace CommandLine

@@ -2,6 +2,7 @@
 
 #include "CommandLineText/Messages.h"
 #include "DebugServices/GlobalLog.h"
+#include "studio/window/PlainTexts.h"
 
 #include <QColor>
 
@@ -172,7 +173,7 @@ QVariant VLogModel::data(const QModelIndex& i_rIndex, int i_Role) const
 			return rEntry.m_Count == 1 ? text : tr("%1 (%2 times)").arg(text).arg(rEntry.m_Count);
 		}
 		}
-	case Qt::ToolTipRole: return i_rIndex.column() == EText ? rEntry.m_Text.toHtmlEscaped() : QVariant();
+	case Qt::ToolTipRole: return i_rIndex.column() == EText ? PlainToolTip(rEntry.m_Text) : QVariant();
 	case Qt::ForegroundRole:
 		if (rEntry.m_Level <= NVX::ELogError)
 			return QColor(0xf0625a);

@@ -3,6 +3,7 @@
 #include "studio/motion/ResidualModel.h"
 #include "studio/motion/TimeLine.h"
 #include "studio/window/Named.h"
+#include "studio/window/PlainTexts.h"
 
 #include <QAction>
 #include <QCheckBox>
@@ -202,7 +203,7 @@ void VMotionPanel::UpdateControls()
 	else
 		text = QFileInfo(m_Player.Path()).fileName();
 	m_pFile->setText(text);
-	m_pFile->setToolTip(m_Player.Path());
+	m_pFile->setToolTip(PlainToolTip(m_Player.Path()));
 }
 
 void VMotionPanel::UpdateFrame()

@@ -3,6 +3,7 @@
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "studio/panel/RetargetPanel.h"
 #include "studio/window/Named.h"
+#include "studio/window/PlainTexts.h"
 
 #include <QComboBox>
 #include <QDialogButtonBox>
@@ -208,7 +209,7 @@ void VProposeDialog::ShowPair(int i_Row, const QString& i_rReason)
 	const QString reasons =
 	    (pair["present"].toBool() ? tr("its targets are there already; ") : QString()) + pair["reasons"].toString();
 	m_pTable->item(i_Row, EReasons)->setText(reasons);
-	m_pTable->item(i_Row, EReasons)->setToolTip(reasons);
+	m_pTable->item(i_Row, EReasons)->setToolTip(PlainToolTip(reasons));
 }
 
 void VProposeDialog::SelectPair()

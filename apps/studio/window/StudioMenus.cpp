@@ -344,6 +344,7 @@ void VStudioWindow::ShowMouseAndKeys()
 		text += QStringLiteral("<tr><td>%1</td><td>%2</td></tr>").arg(rInput.toHtmlEscaped(), rEffect.toHtmlEscaped());
 	QMessageBox box(
 	    QMessageBox::NoIcon, tr("Mouse and keys"), text + QStringLiteral("</table>"), QMessageBox::Close, this);
+	box.setTextFormat(Qt::RichText);
 	Named(&box, "MouseAndKeysBox", tr("Mouse and keys"));
 	box.exec();
 }
@@ -395,6 +396,7 @@ void VStudioWindow::ShowAbout()
 	       "that a real-time solver moves the character by.</p>")
 	        .arg(QStringLiteral(RETARGET_VERSION)),
 	    QMessageBox::Close, this);
+	box.setTextFormat(Qt::RichText);
 	Named(&box, "AboutBox", tr("About"));
 	box.exec();
 }

@@ -14,6 +14,7 @@
 #include "studio/panel/WorkKeeper.h"
 #include "studio/window/FileDrop.h"
 #include "studio/window/Named.h"
+#include "studio/window/PlainTexts.h"
 #include "studio/window/PreferencesDialog.h"
 #include "studio/window/SkinProgress.h"
 
@@ -55,6 +56,7 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	Named(this, "StudioWindow", tr("Retarget Studio"));
 	setWindowTitle(c_Title);
 	setAcceptDrops(true);
+	new VPlainTexts(this);
 	std::dynamic_pointer_cast<VApplicationObject>(m_pContext->GetApplicationObject())->m_AskToOverwrite =
 	    [this](const std::string& i_rPath) { return MayOverwrite(i_rPath); };
 	new VFileDrop(
