@@ -55,6 +55,9 @@ TEST(Align, BringsEveryCharacterToThePoseOfThePerformer)
 			for (const VJson& rJoint : again.at("aligned").at("joints"))
 				EXPECT_LT(rJoint.at("beforeDegrees").get<double>(), 0.01) << rJoint;
 			EXPECT_NEAR(again.at("aligned").at("liftMm").get<double>(), 0.0, 0.01);
+			// The scale, which comes behind, moves feet about the root.
+			const VJson& rMove = again.at("aligned").at("moveMm");
+			EXPECT_LT(std::hypot(rMove[0].get<double>(), rMove[1].get<double>()), 30.0) << rMove;
 		}
 }
 
@@ -92,6 +95,33 @@ TEST(Align, TurnsTheChainsThatAreAskedForByTheSmallestAngle)
 	{ return Rotation::Product(Rotation::Transposed(PoseOf(i_rFk, "foreArmRight").R), PoseOf(i_rFk, "palmRight").R); };
 	for (std::size_t i = 0; i < 9; ++i)
 		EXPECT_NEAR(local(before)[i], local(after)[i], 1e-9);
+}
+
+/// The performer's legs are splayed by 20 degrees in its bind pose, those of the character hardly.
+TEST(Align, FeetStandWhereThePerformersDoAndLeanAsTheShinsDo)
+{
+	const VScratchFolder folder;
+	Create(folder, {"--feet", "level", "--align"}, "level.qrr", c_Characters[3], c_Performer);
+	Create(folder, {"--feet", "shins", "--align"}, "shins.qrr", c_Characters[3], c_Performer);
+	const VJson performer = RunJson({"fk", c_Performer}, folder);
+	const VJson level = RunJson({"fk", "level.qrr"}, folder);
+	const VJson shins = RunJson({"fk", "shins.qrr"}, folder);
+	for (std::size_t axis = 0; axis < 2; ++axis)
+		EXPECT_NEAR(PoseOf(level, "foot_l").t[axis] + PoseOf(level, "foot_r").t[axis],
+		    PoseOf(performer, "LeftFoot").t[axis] + PoseOf(performer, "RightFoot").t[axis], 1e-6);
+	for (const char* const pName : {"calf_l", "foot_l"})
+		EXPECT_NEAR(PoseOf(level, pName).t[2], PoseOf(shins, pName).t[2], 10.0) << pName;
+	for (const auto& [rFoot, side] : {std::pair(std::string("foot_l"), 1.0), {std::string("foot_r"), -1.0}})
+	{
+		const auto lean = Rotation::AngleAxisFromRotationMatrix(
+		    Rotation::Product(PoseOf(shins, rFoot).R, Rotation::Transposed(PoseOf(level, rFoot).R)));
+		// Ahead is -Y: the sole of the left foot, which is at +X, shows to the left.
+		EXPECT_NEAR(lean[1], -side * std::atan2(137.7, 378.0), 0.01) << rFoot;
+		EXPECT_NEAR(lean[0], 0.0, 0.05) << rFoot;
+		EXPECT_NEAR(lean[2], 0.0, 1e-6) << rFoot;
+	}
+	const VRun wrong = folder.Run({"edit", "level.qrr", "--feet", "flat", "-o", "x.qrr"});
+	EXPECT_EQ(wrong.m_Status, 2) << wrong.m_Err;
 }
 
 TEST(Align, MeasuresTheOffsetsAgainAndRefusesWhatGetsWorse)

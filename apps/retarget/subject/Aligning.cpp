@@ -56,13 +56,16 @@ VJson ToJson(
 	VJson refused = VJson::array();
 	for (const auto& rChain : i_rAlignment.m_Refused)
 		refused.push_back({{"chain", rChain.m_Chain}, {"reason", rChain.m_Reason}});
-	return {{"turnDegrees", Rounded(i_rAlignment.m_TurnDegrees, 3)}, {"liftMm", Rounded(i_rAlignment.m_LiftMm, 3)},
-	    {"joints", joints}, {"refused", refused}};
+	const Rotation::VVector3& rMove = i_rAlignment.m_MoveMm;
+	return {{"turnDegrees", Rounded(i_rAlignment.m_TurnDegrees, 3)},
+	    {"moveMm", {Rounded(rMove[0], 3), Rounded(rMove[1], 3)}}, {"liftMm", Rounded(rMove[2], 3)}, {"joints", joints},
+	    {"refused", refused}};
 }
 
 std::string ToText(
     const VAlignment& i_rAlignment, const VSubjectParametrised& i_rSource, const VSubjectParametrised& i_rTarget)
 {
+	const Rotation::VVector3& rMove = i_rAlignment.m_MoveMm;
 	VTable table;
 	table.AddColumn("TARGET", VTable::ELeft);
 	table.AddColumn("SOURCE", VTable::ELeft);
@@ -73,8 +76,9 @@ std::string ToText(
 		table.AddRow({i_rTarget.m_Segments[rJoint.m_Target].m_Name, i_rSource.m_Segments[rJoint.m_Source].m_Name,
 		    Fixed(rJoint.m_Before, 1), Fixed(rJoint.m_After, 1), rJoint.m_Note});
 	return "Degrees between the directions of segments\n" + table.Text(HasColours(STDOUT_FILENO)) + "Turned by "
-	    + Fixed(Rounded(i_rAlignment.m_TurnDegrees, 1), 1) + " degrees as a whole, lifted by "
-	    + Fixed(Rounded(i_rAlignment.m_LiftMm, 1), 1) + " mm\n";
+	    + Fixed(Rounded(i_rAlignment.m_TurnDegrees, 1), 1) + " degrees as a whole, moved by "
+	    + Fixed(std::hypot(rMove[0], rMove[1]), 1) + " mm along the floor, lifted by " + Fixed(Rounded(rMove[2], 1), 1)
+	    + " mm\n";
 }
 
 } // namespace
@@ -89,6 +93,13 @@ void ChooseChain(VSession& io_rSession, const std::string& i_rChain)
 	rChoice.m_bLegs = bAll || i_rChain == "legs";
 	rChoice.m_bSpine = bAll || i_rChain == "spine";
 	rChoice.m_bOthers = bAll;
+}
+
+void ChooseFeet(VSession& io_rSession, const std::string& i_rFeet)
+{
+	if (i_rFeet != "level" && i_rFeet != "shins")
+		throw VCommandError(EWrongUsage, "--feet: feet go level or with the shins, not \"" + i_rFeet + "\"");
+	io_rSession.m_Alignment.m_bFeetWithShins = i_rFeet == "shins";
 }
 
 void LockSegment(VSession& io_rSession, const std::string& i_rSegment)

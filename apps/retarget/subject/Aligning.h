@@ -14,6 +14,9 @@ namespace CommandLine
 /// "--chain": from here on only what is told, "arms", "legs", "spine" or "all".
 void ChooseChain(VSession& io_rSession, const std::string& i_rChain);
 
+/// "--feet": from here on feet keep their tilt, "level", or lean as the shins do, "shins".
+void ChooseFeet(VSession& io_rSession, const std::string& i_rFeet);
+
 /// "--lock": a segment of the target subject that keeps its joint as it is.
 void LockSegment(VSession& io_rSession, const std::string& i_rSegment);
 

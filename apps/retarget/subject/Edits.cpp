@@ -330,6 +330,10 @@ constexpr VEditKind c_Kinds[] = {
         "From here on, --align reaches only the arms, the legs, or the spine with neck, pelvis and facing (at first "
         "all)",
         ChooseChain},
+    {"--feet", "level|shins",
+        "From here on, --align lets the feet keep their tilt (level, at first), or lean as the shins do (shins): for a "
+        "performer whose legs are splayed in its bind pose, and whose soles are with them",
+        ChooseFeet},
     {"--match-file-pose", nullptr,
         "Set all bind poses so that the segments stand as the bones do in the FBX file; belongs after --prune-joints",
         MatchFilePose, true},

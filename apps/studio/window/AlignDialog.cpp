@@ -85,10 +85,12 @@ bool VAlignDialog::Align()
 			m_pTable->setItem(row, column, new QTableWidgetItem(texts[column]));
 	}
 	m_pTable->resizeColumnsToContents();
-	QStringList notes{
-	    tr("Degrees between the directions of segments. Turned by %1 degrees as a whole, lifted by %2 mm.")
-	        .arg(aligned["turn"].toDouble(), 0, 'f', 1)
-	        .arg(aligned["lift"].toDouble(), 0, 'f', 1)};
+	QStringList notes{tr(
+	    "Degrees between the directions of segments. Turned by %1 degrees as a whole, moved by %2 mm along the floor, "
+	    "lifted by %3 mm.")
+	                      .arg(aligned["turn"].toDouble(), 0, 'f', 1)
+	                      .arg(aligned["move"].toDouble(), 0, 'f', 1)
+	                      .arg(aligned["lift"].toDouble(), 0, 'f', 1)};
 	for (const QVariant& rRefused : aligned["refused"].toList())
 		notes << rRefused.toString();
 	m_pNote->setText(notes.join('\n'));

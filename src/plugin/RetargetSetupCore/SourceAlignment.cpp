@@ -25,7 +25,7 @@ namespace
 using VJoint = VSubjectParametrised::VJoint;
 
 /// Less than this, in mm, is no lift, and less than this, in radians, no turn.
-constexpr double c_NoLift = 1e-6;
+constexpr double c_NoMove = 1e-6;
 constexpr double c_NoTurn = 1e-9;
 
 /// What the targets tie: of several source segments the first that a rotation target names, or else the first.
@@ -100,7 +100,7 @@ std::optional<VAligned> AlignToSource(const VSubjectParametrised& i_rSourceParam
 		return std::nullopt;
 	}
 	SetupProposal::VAlignmentRequest request{MappedSegments(i_rSourceParametrised, i_rTargetParametrised),
-	    i_rChoice.m_bSpine, i_rChoice.m_bArms, i_rChoice.m_bLegs, i_rChoice.m_bOthers,
+	    i_rChoice.m_bSpine, i_rChoice.m_bArms, i_rChoice.m_bLegs, i_rChoice.m_bOthers, i_rChoice.m_bFeetWithShins,
 	    HeldSegments(i_rTargetParametrised, i_rChoice.m_Locked)};
 	if (request.m_Pairs.empty())
 	{
@@ -119,10 +119,15 @@ std::optional<VAligned> AlignToSource(const VSubjectParametrised& i_rSourceParam
 			    parent == CoreOrlexTypes::c_NoParent ? Rotation::c_Identity3 : rAlignment.m_Turns[parent],
 			    rAlignment.m_Turns[i]);
 	}
-	if (std::abs(rAlignment.m_LiftMm) > c_NoLift
-	    && !MoveRoot(
-	        aligned.m_Subject, [&](Rotation::VPose<double>& io_rWorld) { io_rWorld.t[2] += rAlignment.m_LiftMm; }))
-		aligned.m_Alignment.m_LiftMm = 0.0;
+	const Rotation::VVector3& rMove = rAlignment.m_MoveMm;
+	if (std::hypot(rMove[0], rMove[1], rMove[2]) > c_NoMove
+	    && !MoveRoot(aligned.m_Subject,
+	        [&](Rotation::VPose<double>& io_rWorld)
+	        {
+		        for (std::size_t axis = 0; axis < 3; ++axis)
+			        io_rWorld.t[axis] += rMove[axis];
+	        }))
+		aligned.m_Alignment.m_MoveMm = {};
 	VSubject subject;
 	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(aligned.m_Subject, subject);
 	if (const auto pAlignedFK = KinematicsInBindPose(aligned.m_Subject, subject, "target"))

@@ -20,6 +20,8 @@ struct VAlignmentChoice
 	bool m_bLegs = true;
 	/// What is no part of a body.
 	bool m_bOthers = true;
+	/// Whether feet lean as the shins do.
+	bool m_bFeetWithShins = false;
 	/// Segments of the target whose joints stay as they are.
 	std::set<std::size_t> m_Locked;
 };

@@ -109,8 +109,9 @@ QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains)
 	for (const SetupProposal::VRefusedChain& rChain : alignment->m_Refused)
 		refused << QString("The %1 stays as it is: %2")
 		               .arg(QString::fromStdString(rChain.m_Chain), QString::fromStdString(rChain.m_Reason));
-	return {
-	    {"joints", joints}, {"refused", refused}, {"turn", alignment->m_TurnDegrees}, {"lift", alignment->m_LiftMm}};
+	const Rotation::VVector3& rMove = alignment->m_MoveMm;
+	return {{"joints", joints}, {"refused", refused}, {"turn", alignment->m_TurnDegrees},
+	    {"move", std::hypot(rMove[0], rMove[1])}, {"lift", rMove[2]}};
 }
 
 void VRetargetSetup::EndAlignment(bool i_bKeep)

@@ -192,9 +192,10 @@ public:
 			if (Wanted().contains(rAim.m_Member.m_Chain))
 				alignment.m_Joints.push_back(Row(rAim, chains, posed));
 		alignment.m_TurnDegrees = Turns(chains) ? c_InDegrees * m_Turn : 0.0;
-		alignment.m_LiftMm = Lift(posed);
+		alignment.m_MoveMm = Move(chains, posed);
 		for (VVector3& rPlace : posed.m_Places)
-			rPlace[2] += alignment.m_LiftMm;
+			for (std::size_t axis = 0; axis < 3; ++axis)
+				rPlace[axis] += alignment.m_MoveMm[axis];
 		alignment.m_Turns = std::move(posed.m_Turns);
 		alignment.m_Places = std::move(posed.m_Places);
 		return alignment;
@@ -391,7 +392,8 @@ private:
 		const VVector3 wished = Wished(rAim, i_rChains);
 		const VVector3 atRest = Pointing(rAim, PlacesAtRest());
 		if (const VVector3 now = Rotation::Product(i_rBody, atRest); KeepsTilt(rAim, now, wished))
-			return Rotation::Product(AboutVertical(HeadingFromTo(now, wished)), i_rBody);
+			return WithShin(
+			    i_Joint, wished, Rotation::Product(AboutVertical(HeadingFromTo(now, wished)), i_rBody), io_rPosed);
 		const VVector3 carried = Rotation::Product(i_rCarried, atRest);
 		if (const double angle = AngleFromTo(carried, wished); angle > io_rPosed.m_Farthest[i_rMember.m_Chain])
 		{
@@ -399,6 +401,26 @@ private:
 			io_rPosed.m_FarthestJoint[i_rMember.m_Chain] = i_Joint;
 		}
 		return Rotation::Product(Swing(carried, wished), i_rCarried);
+	}
+
+	/// A foot that leans as its shin does, about the way that it points, if that is asked for.
+	VMatrix3 WithShin(std::size_t i_Foot, const VVector3& i_rWay, const VMatrix3& i_rTurn, const VPosed& i_rPosed) const
+	{
+		std::int64_t shin = m_Target[i_Foot].m_Parent;
+		while (shin >= 0 && m_MemberOf[std::size_t(shin)] < 0)
+			shin = m_Target[std::size_t(shin)].m_Parent;
+		if (!m_rRequest.m_bFeetWithShins || shin < 0)
+			return i_rTurn;
+		VVector3 ahead = Horizontal(i_rWay);
+		const double length = LengthOf(ahead);
+		const auto lean = [&](const VVector3& i_rShin)
+		{ return std::atan2((i_rShin[1] * ahead[0] - i_rShin[0] * ahead[1]) / length, -i_rShin[2]); };
+		const VVector3 atRest = FromTo(m_Target[std::size_t(shin)].m_Place, m_Target[i_Foot].m_Place);
+		const double angle = lean(FromTo(i_rPosed.m_Places[std::size_t(shin)], i_rPosed.m_Places[i_Foot]))
+		    - lean(Rotation::Product(i_rTurn, atRest));
+		for (double& rValue : ahead)
+			rValue *= angle / length;
+		return Rotation::Product(Rotation::RotationMatrixFromAngleAxis(ahead), i_rTurn);
 	}
 
 	VAlignedJoint Row(const VAim& i_rAim, const VChains& i_rChains, const VPosed& i_rPosed) const
@@ -416,7 +438,8 @@ private:
 		else if (held != m_rRequest.m_Held.end())
 			row.m_Note = "stays: it " + held->second;
 		else if (bFoot)
-			row.m_Note = "seen from above: the foot keeps its tilt";
+			row.m_Note = m_rRequest.m_bFeetWithShins ? "seen from above: the foot leans as the shin does"
+			                                         : "seen from above: the foot keeps its tilt";
 		else if (i_rAim.m_Member.m_Part == EPelvis)
 			row.m_Note = "by the line through the hips";
 		return row;
@@ -465,6 +488,22 @@ private:
 	{
 		const std::string text = NumberText::PrintF(std::round(10.0 * i_Degrees) / 10.0);
 		return text.substr(0, text.find('.') + 2);
+	}
+
+	VVector3 Move(const VChains& i_rChains, const VPosed& i_rPosed) const
+	{
+		VVector3 move{0.0, 0.0, Lift(i_rPosed)};
+		const VMember* const pLeft = Find(EFoot, ESide::Left);
+		const VMember* const pRight = Find(EFoot, ESide::Right);
+		if (!pLeft || !pRight || !i_rChains.contains(ELeftLeg) || !i_rChains.contains(ERightLeg) || !Turns(i_rChains))
+			return move;
+		for (const VMember* const pFoot : {pLeft, pRight})
+		{
+			const VVector3 way = FromTo(i_rPosed.m_Places[pFoot->m_Target], m_Source[pFoot->m_Source].m_Place);
+			for (std::size_t axis = 0; axis < 2; ++axis)
+				move[axis] += 0.5 * way[axis];
+		}
+		return move;
 	}
 
 	double Lift(const VPosed& i_rPosed) const

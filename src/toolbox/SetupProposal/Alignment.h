@@ -26,6 +26,8 @@ struct VAlignmentRequest
 	bool m_bArms = true;
 	bool m_bLegs = true;
 	bool m_bOthers = true;
+	/// Whether feet lean as the shins do, seen from ahead; else they keep their tilt.
+	bool m_bFeetWithShins = false;
 	/// Joints of the target that keep their pose against their parent, and why: "is locked".
 	std::map<std::size_t, std::string> m_Held;
 };
@@ -63,14 +65,19 @@ struct VAlignment
 	std::vector<VRefusedChain> m_Refused;
 	/// Of the whole about the vertical, to the left as seen from above.
 	double m_TurnDegrees = 0.0;
-	/// Of the root, so that the feet stand where they stood or, if that was not the floor, on the floor.
-	double m_LiftMm = 0.0;
+	/// Of the root: along the floor, so that the feet stand where the source's do, and up, so that they stand as high
+	/// as they did or, if that was not the floor, on the floor.
+	Rotation::VVector3 m_MoveMm{};
 };
 
 /// Turns each joint of a chain by the smallest angle that lets it point where the source's points, from the root on:
 /// what it is turned about its own length stays. Clavicles and what is no part of a chain keep their pose against their
 /// parent; so does a pelvis, whose hips are brought level with the source's. Head and feet keep their tilt in the
-/// world, a foot turns about the vertical: their slopes are of the build, not of the pose.
+/// world, a foot turns about the vertical: their slopes are of the build, not of the pose. Where the source's soles
+/// lean outwards with splayed shins, which no joint's place tells, feet go with the shins on request.
+///
+/// The whole is moved to where the source's feet stand. Offsets of targets turn with their segments: a foot whose ankle
+/// stands 50 mm behind the source's would be lifted by 25 mm with each heel.
 VAlignment Align(const VRestSkeleton& i_rSource, const VRestSkeleton& i_rTarget, const VAlignmentRequest& i_rRequest);
 
 } // namespace SetupProposal
