@@ -3,8 +3,8 @@
 
     make_take.py [-o FILE]
 
-Joints have the names and lengths of the performer's segments; where all angles are zero it stands in its T-pose.
-Centimetres, Y up, facing +Z. The same call always gives the same bytes.
+Joints have the names and lengths of the performer's segments; where all angles are zero it stands in its bind pose. The
+first frame is the T-pose. Centimetres, Y up, facing +Z. The same call always gives the same bytes.
 """
 
 import argparse
@@ -30,9 +30,8 @@ WALK_DROP, SQUAT_DROP = 56.0, 330.0
 # Pelvis and trunk follow the feet as through a window of that width.
 SMOOTH_TIME = 0.16
 
-# Joints of one angle are the performer's hinges; the pelvis has a place, too.
+# The pelvis has a place, too.
 ROOT_CHANNELS = "Xposition Yposition Zposition Zrotation Xrotation Yrotation"
-HINGES = {"Tibia": 0, "Radius": 1}
 FIXED = ("CraniumTop", "Thumb", "Toes")
 DECIMALS = 3
 
@@ -69,14 +68,31 @@ def turned(matrix):
     return [row[:3] + [0.0] for row in matrix[:3]] + [[0.0, 0.0, 0.0, 1.0]]
 
 
-def rotation_vector(text):
-    vector = [float(token) for token in text.split()]
-    assert vector[1] == vector[2] == 0.0, "the performer's joints are oriented about X alone"
-    return axis_rotation("x", math.degrees(vector[0]))
+def about(axis, angle):
+    """By radians about an axis of any direction."""
+    c, s = math.cos(angle), math.sin(angle)
+    x, y, z = normalised(axis)
+    return frame_of((c + (1 - c) * x * x, (1 - c) * x * y + s * z, (1 - c) * x * z - s * y),
+                    ((1 - c) * x * y - s * z, c + (1 - c) * y * y, (1 - c) * y * z + s * x),
+                    ((1 - c) * x * z + s * y, (1 - c) * y * z - s * x, c + (1 - c) * z * z))
+
+
+def vector_rotation(vector):
+    angle = math.sqrt(sum(x * x for x in vector))
+    return about(vector, angle) if angle > 0.0 else identity()
+
+
+def bind_motion(segment):
+    """What its joint turns by in the bind pose."""
+    if segment.axes:
+        turns = [about(axis, angle) for axis, angle in zip(segment.axes, segment.bind)]
+        return multiply(*turns) if len(turns) > 1 else turns[0]
+    return vector_rotation(segment.bind[:3])
 
 
 class Bone:
-    """A segment of the performer in its T-pose, with axes that stand unturned there."""
+    """A segment of the performer in its T-pose, with axes that stand unturned there; bound is how it is turned in the
+    bind pose."""
 
     def __init__(self, segment, parent, values):
         self.name = segment.name
@@ -87,7 +103,10 @@ class Bone:
         offset = [make_performer.evaluate(text, values) for text in segment.offset.split()]
         oriented = parent.oriented if parent else identity()
         self.offset = transform_point(oriented, offset)
-        self.oriented = multiply(oriented, rotation_vector(segment.orientation))
+        orientation = vector_rotation([float(token) for token in segment.orientation.split()])
+        self.oriented = multiply(oriented, orientation)
+        above = multiply(parent.bound, oriented) if parent else identity()
+        self.bound = multiply(above, orientation, bind_motion(segment), rigid_inverse(self.oriented))
         if parent:
             parent.children.append(self)
 
@@ -171,10 +190,13 @@ class Body:
         place = transform_point(self.world[bone.parent.name], bone.offset)
         self.world[name] = frame_of(*([row[k] for row in rotation[:3]] for k in range(3)), place)
 
+    def since_bind(self, name):
+        return turned(multiply(self.world[name], rigid_inverse(self.bones[name].bound)))
+
     def local_rotation(self, name):
         bone = self.bones[name]
-        parent = self.world[bone.parent.name] if bone.parent else identity()
-        return turned(multiply(rigid_inverse(parent), self.world[name]))
+        parent = self.since_bind(bone.parent.name) if bone.parent else identity()
+        return multiply(rigid_inverse(parent), self.since_bind(name))
 
 
 def make_translation(offset):
@@ -268,13 +290,6 @@ def angles_zxy(matrix):
                                               math.atan2(-matrix[2][0], matrix[2][2]))]
 
 
-def hinge_angle(matrix, axis):
-    """Of a rotation about one axis, whatever its angle."""
-    first = (axis + 1) % 3
-    second = (first + 1) % 3
-    return math.degrees(math.atan2(matrix[second][first], matrix[first][first]))
-
-
 def centimetres(place):
     return [0.1 * place[0], 0.1 * place[2], -0.1 * place[1]]
 
@@ -289,8 +304,6 @@ def channels_of(bone):
         return ROOT_CHANNELS.split()
     if bone.kind in FIXED:
         return []
-    if bone.kind in HINGES:
-        return ["XYZ"[HINGES[bone.kind]] + "rotation"]
     return ["Zrotation", "Xrotation", "Yrotation"]
 
 
@@ -298,15 +311,16 @@ def write_hierarchy(lines, bone, depth):
     indent = "\t" * depth
     lines.append("%s%s %s" % (indent, "JOINT" if bone.parent else "ROOT", bone.name))
     lines.append(indent + "{")
-    lines.append("%s\tOFFSET %s" % (indent, text(centimetres(bone.offset) if bone.parent else (0.0, 0.0, 0.0))))
+    offset = transform_point(bone.parent.bound, bone.offset) if bone.parent else (0.0, 0.0, 0.0)
+    lines.append("%s\tOFFSET %s" % (indent, text(centimetres(offset))))
     channels = channels_of(bone)
     lines.append("%s\tCHANNELS %s" % (indent, " ".join([str(len(channels))] + channels)))
     for child in bone.children:
         write_hierarchy(lines, child, depth + 1)
     if not bone.children:
         end = {"CraniumTop": (0.0, 0.0, 10.0), "Thumb": (bone.side * 30.0, -30.0, 0.0)}.get(bone.kind, (0, -70.0, 0))
-        lines.append("%s\tEnd Site\n%s\t{\n%s\t\tOFFSET %s\n%s\t}" % (indent, indent, indent, text(centimetres(end)),
-                                                                    indent))
+        end = text(centimetres(transform_point(bone.bound, end)))
+        lines.append("%s\tEnd Site\n%s\t{\n%s\t\tOFFSET %s\n%s\t}" % (indent, indent, indent, end, indent))
     lines.append(indent + "}")
 
 
@@ -316,8 +330,7 @@ def frame_values(body, bone):
     if bone.parent is None:
         values += centimetres(place_of(body.world[bone.name]))
     if channels:
-        local = in_file(body.local_rotation(bone.name))
-        values += [hinge_angle(local, HINGES[bone.kind])] if bone.kind in HINGES else angles_zxy(local)
+        values += angles_zxy(in_file(body.local_rotation(bone.name)))
     for child in bone.children:
         values += frame_values(body, child)
     return values

@@ -191,6 +191,22 @@ TEST(SolveReport, TellsWhatWasSpoilt)
 		    Rotation::RotationMatrixFromAngleAxis({25.0 * c_Degree, 0.0, 0.0})));
 		std::ranges::copy(bent, pStates + knee);
 	}
+	// The performer's own left sole turns to the other foot by 20 degrees; Y is the file's way ahead.
+	VScene leaning;
+	auto pLeaning = std::make_shared<TakeIO::VTake>(*scene.m_pTake);
+	for (const TakeIO::VJoint& rJoint : pLeaning->m_Joints)
+		if (rJoint.m_Name == "LeftAnkle")
+			for (std::size_t k = 0; k < rJoint.m_Channels.size(); ++k)
+				if (rJoint.m_Channels[k] == TakeIO::EChannel::YRotation)
+					for (std::size_t i = 0; i < frames; ++i)
+						pLeaning->m_Values[i * pLeaning->m_Channels + rJoint.m_FirstValue + k] += 20.0 * c_Degree;
+	std::string error;
+	leaning.m_pMotion =
+	    TakeSolve::VSourceMotion::Make(scene.m_Performer.m_Subject, scene.m_Performer.m_BindPose, pLeaning, {}, error);
+	const TakeSolve::VSolveReport leans = leaning.Report(exact);
+	EXPECT_NEAR(leans.m_Feet[0].m_SourceLean, fine.m_Feet[0].m_SourceLean + 20.0 * c_Degree, 3.0 * c_Degree);
+	EXPECT_EQ(leans.m_Feet[1].m_SourceLean, fine.m_Feet[1].m_SourceLean);
+
 	// In one frame the head looks back.
 	spoilt.m_States[30 * spoilt.m_NumberOfStates + scene.State("Head") + 2] += std::numbers::pi;
 	spoilt.m_Converged[7] = 0;

@@ -150,6 +150,25 @@ TEST(Take, IsHandedOn)
 	EXPECT_EQ(folder.Names(), names);
 }
 
+/// What "run" does first for somebody new.
+TEST(Solve, TheDemoHasNoFindings)
+{
+	const VScratchFolder folder;
+	const std::string demo = RETARGET_SOURCE "/demo/";
+	const VRun made = folder.Run({"create", "--fbx", demo + "character.fbx", "--source", demo + "performer.qrs",
+	    "--edits", demo + "mapping.json", "--prune-joints", "--root-height", "scale", "--align", "--scale", "fit",
+	    "--update-targets", "-o", "kestrel.qrr", "--strict", "-q"});
+	EXPECT_EQ(made.m_Status, 0) << made.m_Err;
+	const VRun solved = folder.Run({"solve", "kestrel.qrr", "--take", demo + "walk.bvh", "--source",
+	    demo + "performer.qrs", "--json", "--strict"});
+	EXPECT_EQ(solved.m_Status, 0) << solved.m_Err;
+	EXPECT_EQ(solved.m_Err, "");
+	const VJson report = VJson::parse(solved.m_Out);
+	EXPECT_EQ(report.at("findings"), VJson::array());
+	for (const VJson& rFoot : report.at("feet"))
+		EXPECT_NEAR(rFoot.at("performerLean").get<double>(), 0.0, 2.0);
+}
+
 /// A character that is set up for the performer of a take, in the words of its file.
 TEST(Solve, PlaysATakeThroughASubject)
 {

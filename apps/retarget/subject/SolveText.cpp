@@ -23,6 +23,8 @@ constexpr double c_FineSlide = 30.0;
 constexpr double c_FineHeight = 30.0;
 /// What the floor of a take may be off, in mm.
 constexpr double c_FineFloor = 10.0;
+/// Degrees. Feet roll by half of that from stance to stance.
+constexpr double c_FineLean = 10.0;
 /// A knee may differ so much, in radians.
 constexpr double c_FineFlexion = 16.0 / c_Degrees;
 constexpr double c_FineAxis = 20.0 / c_Degrees;
@@ -106,6 +108,14 @@ std::string BendTable(const VSolveResult& i_rResult)
 	return table.Text(HasColours(STDOUT_FILENO), TerminalWidth());
 }
 
+std::string LeansText(const std::vector<VFootQuality>& i_rFeet)
+{
+	std::string text;
+	for (const VFootQuality& rFoot : i_rFeet)
+		text += (text.empty() ? "" : " and ") + Fixed(c_Degrees * rFoot.m_SourceLean, 0);
+	return text;
+}
+
 } // namespace
 
 std::vector<VFinding> FindingsOf(const VSolveResult& i_rResult)
@@ -125,6 +135,15 @@ std::vector<VFinding> FindingsOf(const VSolveResult& i_rResult)
 		        + (rReport.m_Floor < 0.0 ? "lower" : "higher")
 		        + " than in the bind pose, and the character's go along. See where the floor of the take is, and that "
 		          "of the performer; heights of feet are told from where the performer's stand."});
+	if (std::ranges::any_of(rReport.m_Feet,
+	        [](const VFootQuality& i_rFoot) { return std::abs(c_Degrees * i_rFoot.m_SourceLean) > c_FineLean; }))
+		findings.push_back({"lean",
+		    "Where the performer's feet stand in the take, their soles are turned towards each other by "
+		        + LeansText(rReport.m_Feet)
+		        + " degrees against the bind pose: there they most likely lean with splayed legs. A character whose "
+		          "feet "
+		          "are level in its bind pose stands on their edges then; --feet shins before --align lets them lean "
+		          "alike."});
 	for (const VFootQuality& rFoot : rReport.m_Feet)
 	{
 		const std::string& rName = rSegments[rFoot.m_Target].m_Name;
@@ -195,7 +214,8 @@ VJson SolveToJson(const VSolveResult& i_rResult)
 	for (const VFootQuality& rFoot : rReport.m_Feet)
 		feet.push_back({{"name", rSegments[rFoot.m_Target].m_Name}, {"side", SideWord(rFoot.m_Side)},
 		    {"standing", rFoot.m_StandingFrames}, {"slide", Rounded(rFoot.m_Slide)},
-		    {"performerSlide", Rounded(rFoot.m_SourceSlide)}, {"slideFrame", rFoot.m_SlideFrame},
+		    {"performerSlide", Rounded(rFoot.m_SourceSlide)},
+		    {"performerLean", Rounded(c_Degrees * rFoot.m_SourceLean)}, {"slideFrame", rFoot.m_SlideFrame},
 		    {"highest", Rounded(rFoot.m_Highest)}, {"highestFrame", rFoot.m_HighestFrame},
 		    {"lowestStanding", Rounded(rFoot.m_LowestStanding)}, {"lowest", Rounded(rFoot.m_Lowest)},
 		    {"lowestFrame", rFoot.m_LowestFrame}});

@@ -94,6 +94,9 @@ public:
 	{
 		m_Quality.m_Side = i_Side;
 		m_Quality.m_Source = i_rAnkle.m_Source;
+		m_FromBind = Rotation::Transposed(i_rSourceBind[m_Ankle.m_Source].R);
+		m_Ahead = Difference(i_rSourceBind[m_Toe.m_Source].t, i_rSourceBind[m_Ankle.m_Source].t);
+		m_Ahead[2] = 0.0;
 		m_Quality.m_Target = i_rAnkle.m_Target;
 	}
 
@@ -101,6 +104,7 @@ public:
 	{
 		m_SourcePlaces.push_back(i_rSource[m_Toe.m_Source].t);
 		m_TargetPlaces.push_back(i_rTarget[m_Toe.m_Target].t);
+		m_SourceLeans.push_back(LeanOf(i_rSource[m_Ankle.m_Source].R));
 		m_SourceHeights.push_back(std::min(i_rSource[m_Ankle.m_Source].t[2] - m_SourceBind.m_Ankle,
 		    i_rSource[m_Toe.m_Source].t[2] - m_SourceBind.m_Toe));
 		m_Heights.push_back(std::min(i_rTarget[m_Ankle.m_Target].t[2] - m_TargetBind.m_Ankle,
@@ -126,10 +130,12 @@ public:
 		const auto slide = [](const std::vector<VVector3>& i_rPlaces, std::size_t i_From, std::size_t i_To)
 		{ return std::hypot(i_rPlaces[i_To][0] - i_rPlaces[i_From][0], i_rPlaces[i_To][1] - i_rPlaces[i_From][1]); };
 		bool bFirst = true;
+		std::vector<double> leans;
 		for (const VStand& rStand : m_Stands)
 			for (std::size_t i = rStand.m_First; i < rStand.m_Last; ++i)
 			{
 				++m_Quality.m_StandingFrames;
+				leans.push_back(m_SourceLeans[i]);
 				if (bFirst || m_Heights[i] > m_Quality.m_Highest)
 				{
 					m_Quality.m_Highest = m_Heights[i];
@@ -146,10 +152,24 @@ public:
 					m_Quality.m_SlideFrame = i_First + i;
 				}
 			}
+		m_Quality.m_SourceLean = Percentile(std::move(leans), 0.5);
 		return m_Quality;
 	}
 
 private:
+	/// 0 where the foot points up or down.
+	double LeanOf(const Rotation::VMatrix3& i_rFoot) const
+	{
+		const Rotation::VMatrix3 turn = Rotation::Product(i_rFoot, m_FromBind);
+		const VVector3 up = Rotation::Product(turn, VVector3{0.0, 0.0, 1.0});
+		const VVector3 ahead = Rotation::Product(turn, m_Ahead);
+		const double length = std::hypot(ahead[0], ahead[1]);
+		if (!(length > 0.0))
+			return 0.0;
+		const double left = (up[1] * ahead[0] - up[0] * ahead[1]) / length;
+		return (m_Quality.m_Side == ESide::Left ? 1.0 : -1.0) * std::atan2(left, up[2]);
+	}
+
 	/// In the bind pose.
 	struct VHeights
 	{
@@ -165,6 +185,10 @@ private:
 	std::vector<double> m_SourceHeights;
 	std::vector<VVector3> m_SourcePlaces;
 	std::vector<VVector3> m_TargetPlaces;
+	Rotation::VMatrix3 m_FromBind = Rotation::c_Identity3;
+	/// From ankle to toe along the floor, in the bind pose.
+	VVector3 m_Ahead{};
+	std::vector<double> m_SourceLeans;
 	std::vector<double> m_Heights;
 	VFootQuality m_Quality;
 };

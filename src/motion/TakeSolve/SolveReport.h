@@ -37,6 +37,9 @@ struct VFootQuality
 	double m_Slide = 0.0;
 	double m_SourceSlide = 0.0;
 	std::size_t m_SlideFrame = 0;
+	/// How far the performer's sole is turned towards the other foot against its bind pose, about the way that the foot
+	/// points, in radians: the median over the standing frames.
+	double m_SourceLean = 0.0;
 	/// Over the standing frames.
 	double m_Highest = 0.0;
 	std::size_t m_HighestFrame = 0;
