@@ -428,27 +428,29 @@ TEST_F(Document, AHostMayWantEachPairOnce)
 	    [&](int i_Index) { told += "found " + std::to_string(i_Index) + ";"; });
 	QObject::connect(&m_Document, &VRetargetSetup::commandIgnored,
 	    [&](const QString&, const QString& i_rReason) { told += i_rReason.toStdString(); });
-	const auto add = [&](int i_Segment, bool i_bPosition, bool i_bSymmetry)
+	const auto add = [&](int i_Source, int i_Target, bool i_bPosition, bool i_bSymmetry)
 	{
 		told.clear();
-		m_Document.AddTarget(i_Segment, i_Segment, i_bPosition, i_bSymmetry);
+		m_Document.AddTarget(i_Source, i_Target, i_bPosition, i_bSymmetry);
 		return Target().m_Targets.size();
 	};
-	EXPECT_EQ(add(0, true, false), 1u);
-	EXPECT_EQ(add(0, true, false), 2u) << "the plain form";
+	EXPECT_EQ(add(0, 0, true, false), 1u);
+	EXPECT_EQ(add(0, 0, true, false), 2u) << "the plain form";
 	const auto pHost = std::make_shared<VAskedHost>();
 	pHost->m_Rules.m_bEachPairOnce = true;
 	m_Document.SetHostRules(pHost);
-	EXPECT_EQ(add(0, true, false), 2u);
+	EXPECT_EQ(add(0, 0, true, false), 2u);
 	EXPECT_EQ(told, "There is a target 'Hips>pelvis' already.found 0;");
-	EXPECT_EQ(add(0, false, false), 3u) << "of another kind";
-	EXPECT_EQ(add(1, true, false), 4u);
+	EXPECT_EQ(add(0, 0, false, false), 3u) << "of another kind";
+	EXPECT_EQ(add(1, 1, true, false), 4u);
 	VLogRecorder log;
-	EXPECT_EQ(add(1, true, true), 5u);
+	EXPECT_EQ(add(1, 1, true, true), 5u);
 	EXPECT_EQ(told, "");
 	EXPECT_EQ(log.Take(), "3 RetargetSetup: There is a target 'LeftArm>arm_l' already: only the other side is added");
-	EXPECT_EQ(add(2, true, true), 5u) << "both sides are there";
+	EXPECT_EQ(add(2, 2, true, true), 5u) << "both sides are there";
 	EXPECT_EQ(told, "There is a target 'RightArm>arm_r' already.found 4;");
+	EXPECT_EQ(add(3, 0, true, false), 6u) << "of another source segment";
+	EXPECT_EQ(add(0, 3, true, false), 7u) << "on another target segment";
 }
 
 TEST_F(Document, AsksItsHostBeforeAChangedFileIsOverwritten)

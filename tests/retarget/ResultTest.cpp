@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdlib>
 #include <optional>
 #include <sstream>
 
@@ -468,6 +469,24 @@ TEST(Schema, ToFileAndStandardOutput)
 	EXPECT_EQ(folder.Run({"schema", "-o", "s.xsd"}).m_Status, 0);
 	EXPECT_EQ(folder.Read("s.xsd"), run.m_Out);
 	EXPECT_EQ(folder.Run({"schema", "-o", "-"}).m_Out, run.m_Out);
+
+	// The help's example holds for the demo's files of these names.
+	for (const char* const pName : {"performer.qrs", "mapping.json", "character.fbx"})
+		folder.Write(pName, Get(std::string(RETARGET_SOURCE "/demo/") + pName));
+	EXPECT_EQ(folder
+	              .Run({"-q", "create", "--fbx", "character.fbx", "--source", "performer.qrs", "--edits",
+	                  "mapping.json", "-o", "hero.qrr"})
+	              .m_Status,
+	    0);
+	std::istringstream help(folder.Run({"schema", "--help"}).m_Out);
+	std::string example;
+	while (std::getline(help, example) && example.find("xmllint ") == std::string::npos)
+		;
+	EXPECT_EQ(std::system(("cd '" + folder.Path().string() + "' && PATH=\"$(dirname '" RETARGET_PROGRAM "'):$PATH\" && "
+	              + example + " 2> messages")
+	                          .c_str()),
+	    0)
+	    << example << folder.Read("messages");
 }
 
 } // namespace

@@ -144,6 +144,8 @@ TEST(Selection, EnginesHaveTheirOwn)
 TEST_F(Table, HoverAndPress)
 {
 	Show(4);
+	EXPECT_EQ(m_Page.Property("tableRow1weight", "text"), "0.333333");
+	EXPECT_EQ(m_Page.Property("tableRow1weight", "toolTip"), "0.3333333333333333");
 	auto& rPreSelection = m_Page.Selection().PreSelection();
 	m_rSelection.Replace({Source(4)});
 

@@ -187,6 +187,7 @@ FocusScope {
 						anchors.verticalCenter: parent.verticalCenter
 					}
 					OrlexLabel {
+						objectName: row.objectName + modelData.role
 						width: parent.width - (mark.visible ? mark.width + 3 : 0)
 						height: parent.height
 						text: table.cellText(cell.value)
