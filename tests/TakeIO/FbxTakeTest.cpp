@@ -157,8 +157,20 @@ TEST(FbxCurve, WeightedSlopesBendTime)
 	}
 }
 
+using VTestProperties = std::vector<std::pair<std::string, VNumbers>>;
+
+/// A layer above the base, with one curve node and no curve.
+struct VTestLayer
+{
+	VTestProperties m_Properties;
+	/// "T" of the hips, or "R" of the knee.
+	std::string m_Kind;
+	Rotation::VVector3 m_Values{};
+};
+
 /// Hips and a knee below, at scale 2 with Y up and centimetres; the hips walk along x, the knee turns about z.
-std::string TakeFile(const VTestForm& i_rForm, const std::string& i_rLocalStop = {})
+std::string TakeFile(const VTestForm& i_rForm, const std::string& i_rLocalStop = {},
+    const std::vector<VTestLayer>& i_rLayers = {}, const VTestProperties& i_rBase = {})
 {
 	VTestScene scene{{{"hips", "LimbNode", -1, {{"Lcl Translation", {0, 90, 0}}, {"Lcl Scaling", {2, 2, 2}}}},
 	                     {"knee", "LimbNode", 0, {{"Lcl Translation", {0, -20, 0}}}}, {"mesh", "Mesh", -1, {}}},
@@ -183,7 +195,7 @@ std::string TakeFile(const VTestForm& i_rForm, const std::string& i_rLocalStop =
 		span.push_back(PropertyList(7400, {{"LocalStop", {std::stod(i_rLocalStop)}}}));
 	object("AnimationStack", 100, "AnimStack::walk", span);
 	object("AnimationStack", 101, "AnimStack::other", {});
-	object("AnimationLayer", 102, "AnimLayer::base", {});
+	object("AnimationLayer", 102, "AnimLayer::base", {PropertyList(7400, i_rBase)});
 	object("AnimationCurveNode", 103, "AnimCurveNode::T",
 	    {PropertyList(7400, {{"d|X", {7}}, {"d|Y", {80}}, {"d|Z", {0}}})});
 	object("AnimationCurveNode", 104, "AnimCurveNode::R", {PropertyList(7400, {{"d|Z", {0}}})});
@@ -191,6 +203,18 @@ std::string TakeFile(const VTestForm& i_rForm, const std::string& i_rLocalStop =
 	for (const auto& [child, parent, property] : {std::tuple(102, 100, ""), {103, 102, ""}, {104, 102, ""},
 	         {103, 1, "Lcl Translation"}, {104, 2, "Lcl Rotation"}, {105, 103, "d|X"}, {105, 104, "d|Z"}})
 		connect(child, parent, property);
+	for (std::size_t i = 0; i < i_rLayers.size(); ++i)
+	{
+		const auto& [properties, kind, values] = i_rLayers[i];
+		const auto layer = std::int64_t(200 + i);
+		const auto node = std::int64_t(300 + i);
+		object("AnimationLayer", layer, "AnimLayer::above", {PropertyList(7400, properties)});
+		object("AnimationCurveNode", node, ("AnimCurveNode::" + kind).c_str(),
+		    {PropertyList(7400, {{"d|X", {values[0]}}, {"d|Y", {values[1]}}, {"d|Z", {values[2]}}})});
+		connect(layer, 100, "");
+		connect(node, layer, "");
+		connect(node, kind == "T" ? 1 : 2, kind == "T" ? "Lcl Translation" : "Lcl Rotation");
+	}
 	return Write(i_rForm, records);
 }
 
@@ -226,6 +250,65 @@ TEST(FbxTake, PlacesJointsInOurAxes)
 		expect(1, {30, 0, 400});
 		const Rotation::VVector3 turn = Rotation::AngleAxisFromRotationMatrix(poses[1].R);
 		EXPECT_NEAR(turn[1], -3.0 * 3.14159265358979 / 180.0, 1e-12);
+	}
+}
+
+/// At half a second the base has the hips at (3, 80, 0) and the knee at 3 degrees about z; at rest they stand at (0,
+/// 90, 0).
+TEST(FbxTake, LayersAddAndOverride)
+{
+	constexpr double c_Degree = 3.14159265358979 / 180.0;
+	const auto turns = [](std::initializer_list<Rotation::VVector3> i_Degrees)
+	{
+		Rotation::VMatrix3 product = Rotation::c_Identity3;
+		// The file's (x, y, z) is (x, -z, y) here.
+		for (const auto& [x, y, z] : i_Degrees)
+			product = Rotation::Product(
+			    product, Rotation::RotationMatrixFromAngleAxis({x * c_Degree, -z * c_Degree, y * c_Degree}));
+		return product;
+	};
+	struct VRow
+	{
+		const char* m_pName;
+		std::vector<VTestLayer> m_Layers;
+		VTestProperties m_Base;
+		Rotation::VVector3 m_Hips;
+		Rotation::VMatrix3 m_Knee;
+		std::string m_Message;
+	};
+	const Rotation::VVector3 hips{30, 0, 800};
+	const Rotation::VMatrix3 knee = turns({{0, 0, 3}});
+	const std::string left = "3 Layers of the stack \"walk\" that are mute, or beside one that is solo: 1";
+	const VRow rows[]{{"adds half", {{{{"Weight", {50}}}, "T", {10, 0, 4}}}, {}, {80, -20, 800}, knee, ""},
+	    {"overrides", {{{{"BlendMode", {1}}}, "T", {1, 2, 3}}}, {}, {10, -30, 20}, knee, ""},
+	    {"overrides by a quarter", {{{{"BlendMode", {1}}, {"Weight", {25}}}, "T", {1, 2, 3}}}, {}, {25, -7.5, 605},
+	        knee, ""},
+	    {"passes through", {{{{"BlendMode", {2}}}, "T", {1, 2, 3}}}, {}, hips, knee, ""},
+	    {"mute", {{{{"Mute", {1}}}, "T", {1, 2, 3}}}, {}, hips, knee, left},
+	    {"solo", {{{}, "T", {10, 0, 4}}}, {{"Solo", {1}}}, hips, knee, left},
+	    {"base overrides", {}, {{"Weight", {10}}, {"BlendMode", {0}}}, hips, knee, ""},
+	    {"turns", {{{}, "R", {90, 0, 0}}, {{}, "R", {0, 0, 90}}}, {}, hips, turns({{0, 0, 3}, {90, 0, 0}, {0, 0, 90}}),
+	        ""},
+	    {"turns by channel", {{{}, "R", {90, 0, 0}}, {{{"RotationAccumulationMode", {1}}}, "R", {0, 0, 90}}}, {}, hips,
+	        turns({{0, 0, 93}, {90, 0, 0}}), ""},
+	    {"turns half", {{{{"BlendMode", {1}}, {"Weight", {50}}}, "R", {0, 0, 43}}}, {}, hips, turns({{0, 0, 23}}), ""}};
+	for (const VRow& rRow : rows)
+	{
+		SCOPED_TRACE(rRow.m_pName);
+		VTestLog log("TakeIO");
+		VTake take;
+		std::string error;
+		ASSERT_TRUE(
+		    ReadTakeFrom(TakeFile(c_Forms[1], {}, rRow.m_Layers, rRow.m_Base), {{}, {}, 4.0, "walk"}, take, error))
+		    << error;
+		const std::vector<std::string> messages = log.Take();
+		EXPECT_EQ(messages, rRow.m_Message.empty() ? std::vector<std::string>{} : std::vector{rRow.m_Message});
+		std::vector<VJointPose> poses;
+		WorldPoses(take, 2, poses);
+		for (std::size_t i = 0; i < 3; ++i)
+			EXPECT_NEAR(poses[0].t[i], rRow.m_Hips[i], 1e-9) << i;
+		for (std::size_t i = 0; i < 9; ++i)
+			EXPECT_NEAR(poses[1].R[i], rRow.m_Knee[i], 1e-9) << i;
 	}
 }
 

@@ -4,6 +4,7 @@
 #include "TakeIO/Axes.h"
 #include "TakeIO/FbxCurve.h"
 #include "TakeIO/FbxJoints.h"
+#include "TakeIO/FbxLayers.h"
 #include "TakeIO/Limits.h"
 #include "fbxsdk/container/FileKind.h"
 #include "fbxsdk/container/Values.h"
@@ -59,9 +60,18 @@ struct VStack
 	std::string_view m_Name;
 };
 
+/// What a layer has of a node's place, rotation or scaling.
+struct VLayerPart
+{
+	std::size_t m_Layer = 0;
+	EFbxCoordinates m_Kind = EFbxCoordinates::Translation;
+	std::array<VComponent, 3> m_Components;
+};
+
 struct VNode : VFbxJoint
 {
-	std::array<VComponent, 9> m_Components;
+	/// In the order of the layers.
+	std::vector<VLayerPart> m_Parts;
 	/// Whether its place may change: its own coordinates, or the scaling of what is above it.
 	bool m_bMoves = false;
 	bool m_bScales = false;
@@ -218,70 +228,73 @@ private:
 	/// @param i_Kind place, rotation or scaling
 	bool ReadChannel(VNode& io_rNode, std::size_t i_Kind, VElementIndex i_Channel)
 	{
+		if (i_Kind == std::string_view::npos)
+			return true;
 		const VElementTree& rTree = m_Records.Tree();
-		return i_Kind == std::string_view::npos
-		    || ForEachChannel(i_Channel,
-		        [&](std::string_view i_Axis, VElementIndex i_Component)
-		        {
-			        const std::size_t axis = PlaceIn(c_Axes, i_Axis);
-			        if (axis == std::string_view::npos)
-				        return true;
-			        VComponent& rComponent = io_rNode.m_Components[3 * i_Kind + axis];
-			        if (const VElementIndex value = rTree.Find(i_Component, "Default"); value != c_NoElement)
-			        {
-				        rComponent.m_Value = ValueAt(rTree, value, 0).AsReal();
-				        rComponent.m_bGiven = std::abs(rComponent.m_Value) <= TakeIO::Limits::c_Largest;
-				        io_rNode.m_bMoves = true;
-			        }
-			        const VElementIndex keys = rTree.Find(i_Component, "Key");
-			        if (keys == c_NoElement)
-				        return true;
-			        VFbxCurve& rCurve = rComponent.m_Curve.emplace();
-			        if (!KeepKeys(rCurve, rCurve.ReadKeys(rTree, keys, m_Budget)))
-				        return false;
-			        io_rNode.m_bMoves = true;
-			        io_rNode.m_bScales = io_rNode.m_bScales || (i_Kind == 2 && rCurve.LastTime() > rCurve.FirstTime());
-			        return true;
-		        });
+		VLayerPart& rPart = io_rNode.m_Parts.emplace_back();
+		rPart.m_Kind = EFbxCoordinates(i_Kind);
+		return ForEachChannel(i_Channel,
+		    [&](std::string_view i_Axis, VElementIndex i_Component)
+		    {
+			    const std::size_t axis = PlaceIn(c_Axes, i_Axis);
+			    if (axis == std::string_view::npos)
+				    return true;
+			    VComponent& rComponent = rPart.m_Components[axis];
+			    if (const VElementIndex value = rTree.Find(i_Component, "Default"); value != c_NoElement)
+			    {
+				    rComponent.m_Value = ValueAt(rTree, value, 0).AsReal();
+				    rComponent.m_bGiven = std::abs(rComponent.m_Value) <= TakeIO::Limits::c_Largest;
+				    io_rNode.m_bMoves = true;
+			    }
+			    const VElementIndex keys = rTree.Find(i_Component, "Key");
+			    if (keys == c_NoElement)
+				    return true;
+			    VFbxCurve& rCurve = rComponent.m_Curve.emplace();
+			    if (!KeepKeys(rCurve, rCurve.ReadKeys(rTree, keys, m_Budget)))
+				    return false;
+			    io_rNode.m_bMoves = true;
+			    io_rNode.m_bScales = io_rNode.m_bScales
+			        || (rPart.m_Kind == EFbxCoordinates::Scaling && rCurve.LastTime() > rCurve.FirstTime());
+			    return true;
+		    });
 	}
 
-	/// The curves of the first layer, and no others, are inflated.
+	/// The curves of the layers that count, and no others, are inflated.
 	bool ReadCurves()
 	{
-		VObjectIndex layer = c_NoObject;
-		std::size_t layers = 0;
+		m_Layers = ReadFbxLayers(m_Records.Document(), m_Stack.m_Object, m_StackName);
+		constexpr std::int32_t c_NoLayer = -1;
+		const std::size_t objects = m_Records.Document().Objects().size();
+		std::vector<std::int32_t> layerAt(objects, c_NoLayer), layerOf(objects, c_NoLayer);
+		for (std::size_t i = 0; i < m_Layers.size(); ++i)
+			layerAt[m_Layers[i].m_Object] = std::int32_t(i);
 		for (const VConnection& rConnection : m_Records.Document().Connections())
-			if (rConnection.m_Parent == m_Stack.m_Object && IsOf(rConnection.m_Child, "AnimationLayer"))
-				layer = layers++ == 0 ? rConnection.m_Child : layer;
-		if (layers > 1)
-			NVX_LOG("TakeIO", NVX::ELogWarning, "Layers of the stack \"%1%\" that are left out: %2%", m_StackName,
-			    layers - 1);
-		std::vector<bool> inLayer(m_Records.Document().Objects().size());
-		for (const VConnection& rConnection : m_Records.Document().Connections())
-			if (layer != c_NoObject && rConnection.m_Parent == layer && IsOf(rConnection.m_Child, "AnimationCurveNode"))
-				inLayer[rConnection.m_Child] = true;
-		// The first coordinate of the three that a curve node moves.
-		std::vector<std::vector<VComponent*>> moved(m_Records.Document().Objects().size());
+			if (rConnection.m_Parent < objects && layerAt[rConnection.m_Parent] != c_NoLayer
+			    && IsOf(rConnection.m_Child, "AnimationCurveNode"))
+				layerOf[rConnection.m_Child] = layerAt[rConnection.m_Parent];
+		// What a curve node moves: a node and its part.
+		std::vector<std::vector<std::pair<VNode*, std::size_t>>> moved(objects);
 		for (const VConnection& rConnection : m_Records.Document().Connections())
 		{
 			const auto* const pProperty = std::ranges::find(c_Animated, rConnection.m_Property);
 			if (pProperty == std::end(c_Animated) || !IsOf(rConnection.m_Parent, "Model")
-			    || rConnection.m_Child >= inLayer.size() || !inLayer[rConnection.m_Child]
+			    || rConnection.m_Child >= objects || layerOf[rConnection.m_Child] == c_NoLayer
 			    || m_NodeOf[rConnection.m_Parent] < 0)
 				continue;
 			VNode& rNode = m_Nodes[std::size_t(m_NodeOf[rConnection.m_Parent])];
-			const auto kind = std::size_t(pProperty - c_Animated);
-			VComponent* const pFirst = &rNode.m_Components[3 * kind];
-			moved[rConnection.m_Child].push_back(pFirst);
+			moved[rConnection.m_Child].emplace_back(&rNode, rNode.m_Parts.size());
+			VLayerPart& rPart = rNode.m_Parts.emplace_back();
+			rPart.m_Layer = std::size_t(layerOf[rConnection.m_Child]);
+			rPart.m_Kind = EFbxCoordinates(pProperty - c_Animated);
 			rNode.m_bMoves = true;
-			rNode.m_bScales = rNode.m_bScales || kind == 2;
+			rNode.m_bScales = rNode.m_bScales || rPart.m_Kind == EFbxCoordinates::Scaling;
 			VisitProperties(m_Records.Tree(), Object(rConnection.m_Child).m_Element,
-			    [pFirst](std::string_view i_Name, VValueCursor& io_rCursor)
+			    [&rPart](std::string_view i_Name, VValueCursor& io_rCursor)
 			    {
 				    const auto* const pFound = std::ranges::find(c_Components, i_Name);
 				    if (pFound == std::end(c_Components))
 					    return;
-				    VComponent& rComponent = pFirst[pFound - c_Components];
+				    VComponent& rComponent = rPart.m_Components[std::size_t(pFound - c_Components)];
 				    rComponent.m_Value = io_rCursor.Next().AsReal();
 				    rComponent.m_bGiven = std::abs(rComponent.m_Value) <= TakeIO::Limits::c_Largest;
 			    });
@@ -292,15 +305,18 @@ private:
 			if (pComponent == std::end(c_Components) || rConnection.m_Parent >= moved.size()
 			    || !IsOf(rConnection.m_Child, "AnimationCurve"))
 				continue;
-			for (VComponent* const pFirst : moved[rConnection.m_Parent])
+			for (const auto& [pNode, part] : moved[rConnection.m_Parent])
 			{
-				std::optional<VFbxCurve>& rCurve = pFirst[pComponent - c_Components].m_Curve;
+				std::optional<VFbxCurve>& rCurve =
+				    pNode->m_Parts[part].m_Components[std::size_t(pComponent - c_Components)].m_Curve;
 				const bool bSound =
 				    rCurve.emplace().Read(m_Records.Tree(), Object(rConnection.m_Child).m_Element, m_Budget);
 				if (!KeepKeys(*rCurve, bSound))
 					return false;
 			}
 		}
+		for (VNode& rNode : m_Nodes)
+			std::ranges::stable_sort(rNode.m_Parts, {}, &VLayerPart::m_Layer);
 		return true;
 	}
 
@@ -335,9 +351,14 @@ private:
 		const double seconds = ((stop > start ? stop : m_LastKey) - m_Start) / c_FbxSecond;
 		m_Frames = std::floor(seconds * m_rTake.m_Rate + 1e-6) + 1.0;
 		const auto moving = double(std::ranges::count(m_Nodes, true, &VNode::m_bMoves));
+		std::size_t parts = 0;
+		for (const VNode& rNode : m_Nodes)
+			parts += rNode.m_Parts.size();
+		// All layers are evaluated in each frame; a node has three parts in one.
+		const double work = std::max(moving, double(parts) / 3.0) * double(std::size(c_AllChannels));
 		const double most =
 		    std::min(double(TakeIO::Limits::c_Values), c_ValuesOfAny + c_ValuesPerByte * double(m_Bytes.size()));
-		if (!(m_Frames * moving * double(std::size(c_AllChannels)) <= most))
+		if (!(m_Frames * work <= most))
 			return Fail("Its stack \"" + m_StackName + "\" lasts longer than such a file is read");
 		return true;
 	}
@@ -373,13 +394,25 @@ private:
 			const VNode& rNode = m_Nodes[i];
 			VNodeTransform transform = rNode.m_Rest;
 			VVector3* const coordinates[]{&transform.m_Translation, &transform.m_Rotation, &transform.m_Scaling};
-			for (std::size_t k = 0; k < rNode.m_Components.size() && i_Time; ++k)
+			const ERotationOrder order = transform.HasRotationSpace() ? transform.m_Order : ERotationOrder::XYZ;
+			for (std::size_t k = 0; k < rNode.m_Parts.size() && i_Time; ++k)
 			{
-				const VComponent& rComponent = rNode.m_Components[k];
-				double& rValue = (*coordinates[k / 3])[k % 3];
-				rValue = rComponent.m_Curve ? rComponent.m_Curve->At(*i_Time)
-				    : rComponent.m_bGiven   ? rComponent.m_Value
-				                            : rValue;
+				const VLayerPart& rPart = rNode.m_Parts[k];
+				const VFbxLayer& rLayer = m_Layers[rPart.m_Layer];
+				VVector3& rBefore = *coordinates[std::size_t(rPart.m_Kind)];
+				// What a layer does not tell of is as it was, or adds nothing.
+				VVector3 values = rBefore;
+				if (!rLayer.m_bOverrides)
+					values.fill(rPart.m_Kind == EFbxCoordinates::Scaling && !rLayer.m_bAddsScaling ? 1.0 : 0.0);
+				for (std::size_t axis = 0; axis < values.size(); ++axis)
+				{
+					const VComponent& rComponent = rPart.m_Components[axis];
+					if (rComponent.m_Curve)
+						values[axis] = rComponent.m_Curve->At(*i_Time);
+					else if (rComponent.m_bGiven && !rLayer.m_bPassesThrough)
+						values[axis] = rComponent.m_Value;
+				}
+				ApplyLayer(rLayer, rPart.m_Kind, values, order, rBefore);
 			}
 			const VGlobalTransform parent =
 			    rNode.m_Parent < 0 ? VGlobalTransform() : m_Globals[std::size_t(rNode.m_Parent)];
@@ -417,6 +450,8 @@ private:
 	std::vector<std::int32_t> m_NodeOf;
 	std::vector<VStack> m_Stacks;
 	VStack m_Stack;
+	/// A take before version 7 is like a base.
+	std::vector<VFbxLayer> m_Layers{{c_NoObject, 1.0, true}};
 	std::string m_StackName;
 	double m_FirstKey = std::numeric_limits<double>::infinity();
 	double m_LastKey = -std::numeric_limits<double>::infinity();
