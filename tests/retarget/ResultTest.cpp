@@ -210,6 +210,9 @@ TEST(Solve, PlaysATakeThroughASubject)
 		i_More.insert(i_More.begin(), solve.begin(), solve.end());
 		return i_More;
 	};
+	folder.Write("joints.json", R"({"pairs": [{"source": "Hips", "target": "Hips"}]})");
+	folder.Write("tail.json", R"({"pairs": [{"source": "Tail", "target": "Hips"}]})");
+	folder.Write("weights.json", "{\n\"pairs\": [{\"source\": \"Hips\", \"target\": \"Hips\", \"rotation\": 1}]}");
 	const std::vector<VRow> rows{
 	    {"range", with({"--frames", "10:19", "-q"}), 0, "Frames 10 to 19 at 120 Hz", ""},
 	    {"within", with({"--max-position", "1e6", "--max-rotation", "180", "-q"}), 0, "0 of 61 frames", ""},
@@ -220,6 +223,14 @@ TEST(Solve, PlaysATakeThroughASubject)
 	    {"no rest", with({"--rest-frame", "61"}), 2, "", "The take has no frame 61"},
 	    {"no joint", with({"--joint", "Tail:Hips"}), 2, "", "The take has no joint \"Tail\""},
 	    {"no pair", with({"--joint", "Hips"}), 2, "", "\"Hips\" is not JOINT:SEGMENT"},
+	    {"joints", with({"--joints", "joints.json", "-q"}), 0, "0 of 61 frames", ""},
+	    {"no joint of a file", with({"--joints", "tail.json"}), 2, "", "The take has no joint \"Tail\""},
+	    {"weights of joints", with({"--joints", "weights.json"}), 3, "",
+	        "weights.json:2: A joint drives a segment whole"},
+	    {"no mapping", with({"--joints", take}), 3, "", "chest_yxz_120fps.bvh:1: "},
+	    {"nobody's targets", {"solve", "c.qrr", "--take", RETARGET_SOURCE "/demo/walk.bvh"}, 3, "",
+	        "No target can be solved with this performer. Target #0 is left out"},
+	    {"no skin", with({"-o", "walk.glb", "--skins", "."}), 3, "", "--skins: there is no \""},
 	    {"two results", with({"--csv", "--json"}), 2, "", "--csv and --json both print the result"},
 	    {"no drawing", with({"--plot", "c.qrr"}), 2, "", "is an input that saving there would destroy"},
 	    {"no character", with({"-o", "walk.glb"}), 2, "", "that form holds the character, too: --fbx names its"},
@@ -228,6 +239,11 @@ TEST(Solve, PlaysATakeThroughASubject)
 	RunRows(rows, folder);
 	EXPECT_EQ(folder.Run(with({"--plot", "plot.svg"})).m_Status, 0);
 	EXPECT_TRUE(folder.Read("plot.svg").starts_with("<svg "));
+	// The same by the folder where the file lies.
+	EXPECT_EQ(folder.Run(with({"-o", "named.glb", "--fbx", c_Fbx, "-q"})).m_Status, 0);
+	const std::string skins = std::string(c_Fbx).substr(0, std::string(c_Fbx).rfind('/'));
+	EXPECT_EQ(folder.Run(with({"-o", "found.glb", "--skins", skins, "-q"})).m_Status, 0);
+	EXPECT_EQ(folder.Read("found.glb"), folder.Read("named.glb"));
 	// What is handed on is the character's file with that motion, and reads as such.
 	EXPECT_EQ(folder.Run(with({"-o", "walk.fbx", "--fbx", c_Fbx, "-q"})).m_Status, 0);
 	const VJson motion =

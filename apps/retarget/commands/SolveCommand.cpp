@@ -20,6 +20,8 @@
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
 
+#include <boost/filesystem/operations.hpp>
+
 #include <cstdio>
 #include <unistd.h>
 
@@ -39,12 +41,14 @@ struct VSolveSettings
 	std::shared_ptr<TakeIO::VTakeSettings> m_pTake = std::make_shared<TakeIO::VTakeSettings>();
 	std::optional<std::size_t> m_FirstFrame;
 	std::optional<std::size_t> m_LastFrame;
-	std::shared_ptr<TakeSolve::VSourceSettings> m_pPairs = std::make_shared<TakeSolve::VSourceSettings>();
+	std::shared_ptr<VPairSettings> m_pPairs = std::make_shared<VPairSettings>();
 	std::optional<double> m_MaximumPosition;
 	std::optional<double> m_MaximumRotation;
 	bool m_bCsv = false;
 	VOutput m_Plot;
 	VMotionOutput m_Motion;
+	/// Where the character's file lies, if it is not named.
+	std::string m_Skins;
 };
 
 /// "A:B", where either may be left out, or one frame.
@@ -132,7 +136,8 @@ std::string BeyondLimits(const VSolveSettings& i_rSettings, const VSolveResult& 
 /// Before anything is read: what is written, and that it is no input.
 void CheckOutputs(VSolveSettings& io_rSettings)
 {
-	std::vector<std::string> inputs{io_rSettings.m_Subject, io_rSettings.m_Take, io_rSettings.m_Source};
+	std::vector<std::string> inputs{
+	    io_rSettings.m_Subject, io_rSettings.m_Take, io_rSettings.m_Source, io_rSettings.m_pPairs->m_File};
 	if (!io_rSettings.m_Plot.m_Path.empty())
 		CheckOutput(io_rSettings.m_Plot, c_DrawingFile, inputs);
 	VMotionOutput& rMotion = io_rSettings.m_Motion;
@@ -144,23 +149,42 @@ void CheckOutputs(VSolveSettings& io_rSettings)
 	CheckMotionOutput(rMotion, inputs);
 }
 
+std::string CharacterIn(const std::string& i_rFolder, VSession& io_rSession)
+{
+	const std::string& rName = io_rSession.Document().TargetValues().m_pApplicationData->m_Skin;
+	const boost::filesystem::path file = UtilsFileSystem::PathFromUtf8(i_rFolder) / (rName + ".fbx");
+	boost::system::error_code error;
+	if (rName.empty() || !boost::filesystem::is_regular_file(file, error))
+		throw VCommandError(EBadInput,
+		    rName.empty() ? "--skins: the retarget subject does not tell of what FBX file it was made: --fbx names it"
+		                  : "--skins: there is no \"" + UtilsFileSystem::ToUtf8(file) + "\"");
+	return UtilsFileSystem::ToUtf8(file);
+}
+
 EExitStatus Solve(VSolveSettings i_Settings)
 {
+	VSession session;
+	if (!i_Settings.m_Skins.empty())
+	{
+		// Only the subject knows the name.
+		session.LoadTarget(i_Settings.m_Subject);
+		i_Settings.m_Motion.m_Character = CharacterIn(i_Settings.m_Skins, session);
+	}
 	CheckOutputs(i_Settings);
 	const VSolveSettings& i_rSettings = i_Settings;
 	if (i_rSettings.m_bCsv && JsonAsked())
 		throw VCommandError(EWrongUsage, "--csv and --json both print the result: give one of them");
 
-	VSession session;
-	session.LoadTarget(i_rSettings.m_Subject);
+	if (i_rSettings.m_Skins.empty())
+		session.LoadTarget(i_rSettings.m_Subject);
+	const auto pairs = ReadPairs(*i_rSettings.m_pPairs);
 	const auto pTake = std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rSettings.m_Take, *i_rSettings.m_pTake));
 	const TakeSolve::VPosedSubject source(PerformerOf(i_rSettings, session, *pTake));
 	const TakeSolve::VPosedSubject target(session.Target());
 	RequireNoErrors();
 
 	std::string error;
-	const auto pMotion =
-	    TakeSolve::VSourceMotion::Make(source.m_Subject, source.m_BindPose, pTake, *i_rSettings.m_pPairs, error);
+	const auto pMotion = TakeSolve::VSourceMotion::Make(source.m_Subject, source.m_BindPose, pTake, pairs, error);
 	if (!pMotion)
 		throw VCommandError(EWrongUsage, error);
 	const std::size_t last = LastFrameOrRefuse(i_rSettings, pTake->m_Frames);
@@ -177,6 +201,12 @@ EExitStatus Solve(VSolveSettings i_Settings)
 		throw VCommandError(
 		    EBadInput, "\"" + i_rSettings.m_Subject + "\" has a joint without kinematics; retarget check tells which");
 	}
+	bool bAny = false;
+	for (std::size_t i = 0; i < solve->NumberOfTargets(); ++i)
+		bAny = bAny || solve->IsSolved(i);
+	if (!bAny)
+		throw VCommandError(
+		    EBadInput, "No target can be solved with this performer. " + solve->Findings().front().m_Message);
 	TakeSolve::VSolvedTake solved;
 	{
 		VProgressBar bar;
@@ -230,6 +260,7 @@ VCommand AddSolveCommand(CLI::App& io_rProgram)
 	    {"solve hero.qrr --take walk.bvh --source performer.qrs",
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --frames 1:200 --plot walk.svg",
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --fbx hero.fbx -o hero_walk.fbx",
+	        "solve hero.qrr --take walk.bvh --joints walk_joints.json --skins characters -o hero_walk.glb",
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --max-position 50 --max-rotation 20 -q",
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --json | jq '.targets[] | {name, p95}'"});
 	const auto pSettings = std::make_shared<VSolveSettings>();
@@ -265,6 +296,11 @@ VCommand AddSolveCommand(CLI::App& io_rProgram)
 	pApp->add_option("--fbx", pSettings->m_Motion.m_Character, "The character's FBX file, which .glb and .fbx need")
 	    ->option_text("FILE.fbx")
 	    ->check(NotEmpty());
+	pApp->add_option("--skins", pSettings->m_Skins,
+	        "The folder where that file lies, by the name that the retarget subject has of it")
+	    ->option_text("FOLDER")
+	    ->check(NotEmpty())
+	    ->excludes("--fbx");
 	AddForceOption(*pApp, pSettings->m_Plot);
 	return {pApp, [pSettings] { return Solve(*pSettings); }};
 }

@@ -104,7 +104,7 @@ QImage DrawTake(VSession& io_rSession, const VRenderSettings& i_rSettings)
 	const VPosed posedTarget(*target.m_pParametrised);
 	std::string error;
 	const auto pMotion = TakeSolve::VSourceMotion::Make(
-	    posedSource.m_Subject, posedSource.m_BindPose, pTake, *i_rSettings.m_pPairs, error);
+	    posedSource.m_Subject, posedSource.m_BindPose, pTake, ReadPairs(*i_rSettings.m_pPairs), error);
 	if (!pMotion)
 		throw VCommandError(EWrongUsage, error);
 	if (i_rSettings.m_Frames.back() >= pTake->m_Frames)

@@ -27,7 +27,7 @@ struct VRenderSettings
 	/// Empty for the bind poses.
 	std::string m_Take;
 	std::shared_ptr<TakeIO::VTakeSettings> m_pTake = std::make_shared<TakeIO::VTakeSettings>();
-	std::shared_ptr<TakeSolve::VSourceSettings> m_pPairs = std::make_shared<TakeSolve::VSourceSettings>();
+	std::shared_ptr<VPairSettings> m_pPairs = std::make_shared<VPairSettings>();
 	/// One beside the other.
 	std::vector<std::size_t> m_Frames;
 };

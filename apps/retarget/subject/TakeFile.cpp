@@ -2,6 +2,8 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/Parsing.h"
+#include "retarget/subject/SetupFile.h"
 #include "retarget/text/InputFile.h"
 
 #include "TakeIO/Limits.h"
@@ -95,7 +97,7 @@ void AddTakeOptions(CLI::App& io_rApp, const std::shared_ptr<VTakeSettings>& i_r
 	    { return ParseNumber(i_rText, Limits::c_LeastRate, Limits::c_GreatestRate, i_rpSettings->m_Rate); });
 }
 
-void AddPairOptions(CLI::App& io_rApp, const std::shared_ptr<TakeSolve::VSourceSettings>& i_rpSettings)
+void AddPairOptions(CLI::App& io_rApp, const std::shared_ptr<VPairSettings>& i_rpSettings)
 {
 	io_rApp
 	    .add_option_function<std::vector<std::string>>(
@@ -111,6 +113,13 @@ void AddPairOptions(CLI::App& io_rApp, const std::shared_ptr<TakeSolve::VSourceS
 	    ->option_text("JOINT:SEGMENT")
 	    ->expected(1)
 	    ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+	io_rApp
+	    .add_option("--joints", i_rpSettings->m_File,
+	        "Such pairs from a mapping, a JSON text: \"source\" is the joint, \"target\" the segment. \"retarget "
+	        "schema "
+	        "setup\" has its form")
+	    ->option_text("FILE.json")
+	    ->check(NotEmpty());
 	AddParsedOption(io_rApp, "--rest-frame", "FRAME",
 	    "In this frame the performer stands as in the bind pose. Without it the take's rest pose counts, each bone's "
 	    "direction brought onto the performer's",
@@ -122,6 +131,24 @@ void AddPairOptions(CLI::App& io_rApp, const std::shared_ptr<TakeSolve::VSourceS
 		    i_rpSettings->m_RestFrame = frame;
 		    return std::string();
 	    });
+}
+
+TakeSolve::VSourceSettings ReadPairs(const VPairSettings& i_rSettings)
+{
+	constexpr const char* c_pUse = "a mapping of joints";
+	TakeSolve::VSourceSettings settings = i_rSettings;
+	if (i_rSettings.m_File.empty())
+		return settings;
+	for (const SetupIO::VPair& rPair :
+	    ParseSetup(ReadSetupText(i_rSettings.m_File, c_pUse), i_rSettings.m_File, {"pairs"}, c_pUse).m_Pairs)
+	{
+		if (rPair.m_Position || rPair.m_Rotation)
+			throw VCommandError(EBadInput,
+			    i_rSettings.m_File + ":" + std::to_string(rPair.m_Line)
+			        + ": A joint drives a segment whole: its pair has neither \"position\" nor \"rotation\"");
+		settings.m_Joints.push_back({rPair.m_Source, rPair.m_Target});
+	}
+	return settings;
 }
 
 bool ParseFrame(std::string_view i_Text, std::size_t& o_rFrame)

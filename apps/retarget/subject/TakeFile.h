@@ -15,8 +15,17 @@ namespace CommandLine
 /// Adds --up, --stack, --unit and --rate.
 void AddTakeOptions(CLI::App& io_rApp, const std::shared_ptr<TakeIO::VTakeSettings>& i_rpSettings);
 
-/// Adds --joint and --rest-frame.
-void AddPairOptions(CLI::App& io_rApp, const std::shared_ptr<TakeSolve::VSourceSettings>& i_rpSettings);
+struct VPairSettings : TakeSolve::VSourceSettings
+{
+	/// A mapping of joints; empty for none.
+	std::string m_File;
+};
+
+/// Adds --joint, --joints and --rest-frame.
+void AddPairOptions(CLI::App& io_rApp, const std::shared_ptr<VPairSettings>& i_rpSettings);
+
+/// With the pairs of the file. Throws VCommandError with EBadInput for one that is no mapping of joints.
+TakeSolve::VSourceSettings ReadPairs(const VPairSettings& i_rSettings);
 
 /// Throws VCommandError with EBadInput for a file that cannot be read as a take.
 TakeIO::VTake ReadTakeFile(const std::string& i_rPath, const TakeIO::VTakeSettings& i_rSettings);

@@ -252,6 +252,7 @@ constexpr VValue c_Values[] = {
     {"FILE", Files},
     {"FILE...", Files},
     {"FILE.fbx", Files},
+    {"FILE.json", Files},
     {"FILE.qrr", Files},
     {"FILE.qrs", Files},
     {"FIRST:LAST", Nothing},
