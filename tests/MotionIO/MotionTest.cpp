@@ -2,6 +2,7 @@
 #include "../UtilsFileSystem/Log.h"
 #include "../fbxsdk/FbxFileBuilder.h"
 #include "AssimpReader.h"
+#include "GltfRules.h"
 
 #include "FBXIO/FBXReader.h"
 #include "MotionIO/PrintMotion.h"
@@ -16,6 +17,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstring>
 #include <numbers>
 
 using namespace MotionIO;
@@ -258,6 +260,8 @@ TEST_P(MotionFile, IsReadByAnotherProgramAsItWasMade)
 		ASSERT_EQ(PrintMotion(moving.m_Take, EMotionForm::Gltf, &character, settings, bytes, error), EPrinted::Done)
 		    << error;
 		ExpectSame(ReadByAssimp(bytes, "glb", settings.m_Name, c_Frames), moving, Axes(1), 1000.0);
+		EXPECT_EQ(BrokenGltfRule(bytes), "");
+		EXPECT_EQ(BrokenGltfRule(bytes.substr(0, bytes.size() - 4)), "length of the file");
 	}
 	{
 		SCOPED_TRACE("bvh");
@@ -322,6 +326,17 @@ TEST(MotionFiles, HoldTheSkin)
 		AddFrame(moving.m_Take, moving.m_Rest);
 		std::string bytes, error;
 		ASSERT_EQ(PrintMotion(moving.m_Take, EMotionForm::Gltf, &character, {}, bytes, error), EPrinted::Done);
+		EXPECT_EQ(BrokenGltfRule(bytes), "");
+		// Each is found once it is broken.
+		for (const auto& [from, to] : {std::pair("\"JOINTS_0\":", "\"JOINTS_1\":"), {"\"VEC4\"", "\"VEC3\""},
+		         {"\"children\":[1", "\"children\":[0"}, {"\"count\":", "\"count\":9"}, {"\"min\":[", "\"min\":[7"}})
+		{
+			std::string broken = bytes;
+			const std::size_t at = broken.find(from);
+			ASSERT_NE(at, std::string::npos) << from;
+			broken.replace(at, std::strlen(to), to);
+			EXPECT_NE(BrokenGltfRule(broken), "") << to;
+		}
 		FBXIO::FBXReader reader;
 		reader.SetMeshRules(FBXIO::c_FaithfulMeshes);
 		ASSERT_TRUE(reader.LoadFile(pPath));
