@@ -1,4 +1,5 @@
 #include "../Require.h"
+#include "../XmlTree.h"
 
 #include "CoreOrlexQRTIO/Reader.h"
 #include "CoreOrlexQRTIO/Writer.h"
@@ -34,6 +35,12 @@ bool Write(const VContent& i_rContent, std::uint32_t i_Version, std::string& o_r
 }
 
 } // namespace
+
+extern "C" std::size_t LLVMFuzzerCustomMutator(
+    std::uint8_t* io_pData, std::size_t i_Size, std::size_t i_MaximumSize, unsigned int i_Seed)
+{
+	return XmlTree::Mutate(io_pData, i_Size, i_MaximumSize, i_Seed);
+}
 
 /// What was read and written is read again, and is written the same from then on.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i_Size)

@@ -1,4 +1,5 @@
 #include "../Require.h"
+#include "../XmlTree.h"
 
 #include "UtilsRapidXml/Attributes.h"
 #include "UtilsRapidXml/ReaderNode.h"
@@ -37,6 +38,12 @@ void Node(INode& io_rNode)
 }
 
 } // namespace
+
+extern "C" std::size_t LLVMFuzzerCustomMutator(
+    std::uint8_t* io_pData, std::size_t i_Size, std::size_t i_MaximumSize, unsigned int i_Seed)
+{
+	return XmlTree::Mutate(io_pData, i_Size, i_MaximumSize, i_Seed);
+}
 
 /// What parses is walked, and what is printed parses again to the same text; what does not gives an error.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i_Size)
