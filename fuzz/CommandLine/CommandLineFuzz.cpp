@@ -1,0 +1,37 @@
+// Command lines as they are parsed, one argument a line: each is taken, or refused with a sentence. No command runs.
+#include "../Require.h"
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Parsing.h"
+#include "CommandLineText/VisibleText.h"
+#include "DebugServices/GlobalLog.h"
+#include "retarget/Program.h"
+
+#include <cstdint>
+#include <string>
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i_Size)
+{
+	static const auto s_pSilence = NVX::GlobalLog::AddSink([](const NVX::VLogCategory&, int, const std::string&) {});
+	std::vector<std::string> arguments(1);
+	for (std::size_t i = 0; i < i_Size; ++i)
+		if (i_pData[i] == '\n')
+			arguments.emplace_back();
+		else if (i_pData[i] != 0)
+			arguments.back() += char(i_pData[i]);
+	const CommandLine::VProgram program = CommandLine::MakeProgram();
+	try
+	{
+		CommandLine::Parse(*program.m_pApp, std::move(arguments));
+	}
+	catch (const CLI::Success&)
+	{
+	}
+	catch (const CommandLine::VCommandError& rError)
+	{
+		const std::string text = rError.what();
+		Require(!text.empty() && rError.Status() != CommandLine::EFine, "a refusal tells why");
+		const std::string line = CommandLine::VisibleLine(text);
+		Require(CommandLine::VisibleLine(line) == line, "what is shown has nothing left to be made visible");
+	}
+	return 0;
+}
