@@ -5,6 +5,7 @@
 #include "CoreOrlexQRTIO/Writer.h"
 #include "DebugServices/GlobalLog.h"
 #include "FBXIO/FBXReader.h"
+#include "FileDigest/FileDigest.h"
 #include "NVX/Status.h"
 #include "RetargetSetupCore/AngleAxis.h"
 #include "RetargetSetupCore/DefaultPose.h"
@@ -18,7 +19,6 @@
 #include "RetargetSetupCore/RootHeight.h"
 #include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupCore/TargetConstruction.h"
-#include "UtilsFileSystem/Files.h"
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
 
@@ -26,7 +26,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <functional>
 #include <map>
 #include <utility>
 
@@ -92,13 +91,10 @@ void TellSourceOfSaved(const std::string& i_rNamed, const std::string& i_rShown)
 }
 
 /// Of what a file holds; none if it cannot be read.
-std::optional<std::size_t> DigestOf(const boost::filesystem::path& i_rPath)
+std::optional<std::string> DigestOf(const boost::filesystem::path& i_rPath)
 {
-	std::string content;
 	std::string reason;
-	if (UtilsFileSystem::ReadWholeFile(i_rPath, content.max_size(), content, reason) != NVX::Status::c_Success)
-		return std::nullopt;
-	return std::hash<std::string>()(content);
+	return FileDigest::Sha256(i_rPath, reason);
 }
 
 /// Reads the file that is about to be written, in memory, and tells what would not come back.
@@ -359,11 +355,11 @@ std::uint32_t VRetargetSetupCore::RestoreTargetSubject(
 	if (m_History)
 		m_History->Clear();
 	RememberTargetFile(i_rFile, {});
-	std::optional<std::size_t>& rDigest = m_Target.m_pFile->m_Digest;
+	std::optional<std::string>& rDigest = m_Target.m_pFile->m_Digest;
 	boost::system::error_code error;
 	const std::time_t written = boost::filesystem::last_write_time(i_rFile, error);
 	if (!error && rDigest && written > boost::filesystem::last_write_time(i_rCopy, error))
-		rDigest = ~*rDigest;
+		rDigest->clear(); // of no file
 	UnsavedChangesChanged();
 	return NVX::Status::c_Success;
 }
@@ -394,7 +390,7 @@ bool VRetargetSetupCore::MayOverwrite(const boost::filesystem::path& i_rPath) co
 	const VTargetFile& rFile = *m_Target.m_pFile;
 	if (!m_pHostRules || i_rPath != rFile.m_Path || !rFile.m_Digest)
 		return true;
-	const std::optional<std::size_t> now = DigestOf(i_rPath);
+	const std::optional<std::string> now = DigestOf(i_rPath);
 	return !now || now == rFile.m_Digest || m_pHostRules->MayOverwriteChangedFile(UtilsFileSystem::ToUtf8(i_rPath));
 }
 

@@ -51,7 +51,7 @@ struct VTargetFile
 	/// Empty for no file.
 	boost::filesystem::path m_Path;
 	/// Of what the file held when it was last loaded or saved; none for no file.
-	std::optional<std::size_t> m_Digest;
+	std::optional<std::string> m_Digest;
 	/// What the file held then.
 	VSubjectValues m_Saved;
 	/// As it was made from an FBX file.
