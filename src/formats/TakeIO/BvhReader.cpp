@@ -146,7 +146,7 @@ class VBvhReader
 {
 public:
 	VBvhReader(std::string_view i_Bytes, const VTakeSettings& i_rSettings, VTake& o_rTake)
-	    : m_rSettings(i_rSettings), m_Text(i_Bytes), m_rTake(o_rTake)
+	    : m_rSettings(i_rSettings), m_Bytes(i_Bytes.size()), m_Text(i_Bytes), m_rTake(o_rTake)
 	{
 	}
 
@@ -417,6 +417,9 @@ private:
 			}
 			else
 				++m_rTake.m_Frames;
+			if (m_rTake.m_Frames % c_FramesBetweenProgress == 0 && m_rSettings.m_Progress
+			    && !m_rSettings.m_Progress(1.0 - double(m_Text.BytesLeft()) / double(m_Bytes)))
+				return Fail("The reading was ended");
 		}
 		if (shortLine > 0)
 			NVX_LOG("TakeIO", NVX::ELogWarning, "Its last line (%1%) is cut off and left out", shortLine);
@@ -426,10 +429,12 @@ private:
 		return true;
 	}
 
+	static constexpr std::size_t c_FramesBetweenProgress = 256;
 	/// What television had; takes without a time between frames are still poses.
 	static constexpr double c_UnknownRate = 30.0;
 
 	const VTakeSettings& m_rSettings;
+	const std::size_t m_Bytes;
 	VText m_Text;
 	VTake& m_rTake;
 	std::vector<std::int32_t> m_Open;

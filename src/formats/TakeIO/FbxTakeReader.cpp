@@ -31,6 +31,8 @@ constexpr std::uint32_t c_FirstVersionWithStacks = 7000;
 constexpr double c_ValuesOfAny = 2e6;
 constexpr double c_ValuesPerByte = 16.0;
 
+constexpr std::size_t c_FramesBetweenProgress = 64;
+
 constexpr std::string_view c_Animated[]{"Lcl Translation", "Lcl Rotation", "Lcl Scaling"};
 constexpr std::string_view c_Components[]{"d|X", "d|Y", "d|Z"};
 
@@ -382,6 +384,9 @@ private:
 		{
 			bFinite = ComputePoses(m_Start + frame * c_FbxSecond / m_rTake.m_Rate);
 			AddFrame(m_rTake, m_Poses);
+			if (m_rTake.m_Frames % c_FramesBetweenProgress == 0 && m_rSettings.m_Progress
+			    && !m_rSettings.m_Progress(frame / m_Frames))
+				return Fail("The reading was ended");
 		}
 		return bFinite || Fail("Its joints are beyond any stage");
 	}

@@ -2,6 +2,7 @@
 
 #include "TakeIO/Take.h"
 
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -19,6 +20,8 @@ struct VTakeSettings
 	std::optional<double> m_Rate;
 	/// The name of an animation stack; without it the first.
 	std::optional<std::string> m_Stack{};
+	/// Called now and then with how much is read, from 0 to 1; false ends the reading, as an error. Empty for none.
+	std::function<bool(double)> m_Progress{};
 };
 
 /// Reads a take from a file of any kind that is known; BVH, and FBX of versions 6 and 7. What is guessed, mended or
