@@ -178,6 +178,11 @@ TEST_F(SceneTransform, ListsTakeTheirSubjectsAndPlaces)
 	const auto pOther = MakeFrame({Item("FlowSubjectForSolving", TestSubject::Make())});
 	props.Update(*pOther, context, nullptr);
 	EXPECT_EQ(props.Subjects().size(), 1u) << "a frame without its items leaves it";
+	props.Forget();
+	props.Update(*pOther, context, nullptr);
+	EXPECT_TRUE(props.Subjects().empty());
+	props.Update(*m_pFrame, context, nullptr);
+	EXPECT_EQ(props.Subjects().size(), 1u) << "the same items again";
 	pOther->AddItem(Item("FlowSubjectSettings", VSubjectSettings{TestSubject::c_Id, true}));
 	props.Update(*pOther, context, nullptr);
 	EXPECT_TRUE(props.Subjects().empty()) << "gone with the next change";

@@ -1,4 +1,5 @@
 #include "../FindItem.h"
+#include "../WaitFor.h"
 #include "Host.h"
 
 #include "NVX/IQuickWidget.h"
@@ -8,6 +9,7 @@
 #include "studio/host/Preferences.h"
 #include "studio/host/Services.h"
 #include "studio/log/LogModel.h"
+#include "studio/motion/TakePlayer.h"
 #include "studio/panel/RetargetPanel.h"
 #include "studio/panel/WorkKeeper.h"
 #include "studio/window/PreferencesDialog.h"
@@ -96,7 +98,7 @@ protected:
 	}
 
 	/// @return whether the files are taken on this part of the window.
-	bool Drop(const QStringList& i_rFiles, QWidget& i_rPart)
+	bool Drop(const QStringList& i_rFiles, QWidget& i_rPart, bool i_bMarked = true)
 	{
 		QMimeData data;
 		QList<QUrl> urls;
@@ -109,7 +111,7 @@ protected:
 		if (!enter.isAccepted())
 			return false;
 		const QQuickItem* const pMark = DropMark();
-		EXPECT_TRUE(pMark && pMark->isVisible());
+		EXPECT_EQ(pMark && pMark->isVisible(), i_bMarked);
 		m_Marked = pMark ? pMark->property("text").toString() : QString();
 		EXPECT_EQ(enter.dropAction(), Qt::CopyAction);
 		QDropEvent drop({10, 10}, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, Qt::ShiftModifier);
@@ -201,6 +203,10 @@ TEST_F(Window, TakesDroppedFilesByKind)
 		EXPECT_EQ(RecentFiles().value(0), c_Fbx);
 	}
 	EXPECT_EQ(pField->text(), "");
+	// On the dock that plays takes it is motion, of which the character has none.
+	EXPECT_TRUE(Drop({c_Fbx}, *m_pWindow->findChild<QDockWidget*>("MotionDock"), false));
+	EXPECT_TRUE(WaitFor([&] { return !m_pWindow->Motion().IsReading(); }, 60000));
+	EXPECT_NE(m_Messages.Take().find("is not opened as a take"), std::string::npos);
 
 	// What cannot be loaded is told, and never becomes the file that is saved to.
 	EXPECT_TRUE(Drop({broken}));

@@ -3,20 +3,25 @@
 #include "WindowFixture.h"
 
 #include "InMemoryHost/Flow.h"
+#include "NVX/ISelectionItem.h"
 #include "TakeIO/BvhWriter.h"
 #include "TakeIO/ReadTake.h"
 #include "TakeSolve/PosedSubject.h"
 #include "TakeSolve/SolvedMotion.h"
 #include "TakeSolve/TargetWords.h"
+#include "TesselPluginInterface/ISelectionManager.h"
 #include "studio/host/Services.h"
+#include "studio/motion/ResidualPlot.h"
 #include "studio/motion/TakePlayer.h"
 #include "studio/motion/TimeLine.h"
 #include "studio/panel/RetargetPanel.h"
 
+#include <QCheckBox>
 #include <QFile>
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
+#include <QLabel>
 #include <QTableView>
 #include <QTest>
 #include <QToolButton>
@@ -96,7 +101,7 @@ protected:
 		{
 			const QJsonObject target = targets[i].toObject();
 			const TakeSolve::VTargetQuality& rQuality = rJudged.m_Report.m_Targets[std::size_t(i)];
-			const double factor = TakeSolve::UnitFactor(rJudged.m_pTarget->m_Targets[std::size_t(i)]);
+			const double factor = TakeSolve::UnitFactor(rJudged.m_pTarget->m_Subject.m_Targets[std::size_t(i)]);
 			EXPECT_NEAR(target["rms"].toDouble(), factor * rQuality.m_Rms, 1e-6) << i;
 			EXPECT_NEAR(target["p95"].toDouble(), factor * rQuality.m_P95, 1e-6) << i;
 			EXPECT_EQ(target["maxFrame"].toInt(), int(rQuality.m_MaxFrame)) << i;
@@ -152,6 +157,29 @@ TEST_F(Motion, IsPlayedJudgedAndLeavesTheDocument)
 	EXPECT_EQ(QString::number(Player().Frame()), worst.data().toString());
 	EXPECT_EQ(Target(), pTarget) << "nothing of it is in the document";
 
+	const auto& rSelection = m_pWindow->Context().GetSelectionManager()->Selection();
+	ASSERT_EQ(rSelection.ItemsOfKind(NVX::ESelectionTarget).size(), 1u) << "chosen in the panel's list, too";
+	EXPECT_EQ(rSelection.ItemsOfKind(NVX::ESelectionTarget)[0].m_ElementIndex, 1u);
+	m_pOperator->ClickRow("targets", 0);
+	EXPECT_EVENTUALLY(rTable.selectionModel()->isRowSelected(0, {}) && !rTable.selectionModel()->isRowSelected(1, {}));
+	auto& rPlot = Widget<StudioHost::VResidualPlot>("ResidualPlot");
+	QTest::mouseClick(rPlot.Canvas(), Qt::LeftButton, {}, {rPlot.PlaceOf(40.0), 3});
+	EXPECT_NEAR(double(Player().Frame()), 40.0, 1.0);
+	m_pOperator->Key(Qt::Key_End);
+	EXPECT_EQ(Player().Frame(), Player().Out());
+	EXPECT_EVENTUALLY(Player().AtRest());
+	m_pOperator->WaitForDrawing();
+	const QImage alone = m_pOperator->See(middle, 150);
+	const auto clickGhost = [this] { QTest::mouseClick(&Widget<QCheckBox>("TakeGhost"), Qt::LeftButton, {}, {8, 8}); };
+	clickGhost();
+	m_pOperator->WaitForDrawing();
+	m_pOperator->WaitForDrawing();
+	EXPECT_NE(m_pOperator->See(middle, 150), alone);
+	clickGhost();
+	m_pOperator->WaitForDrawing();
+	m_pOperator->WaitForDrawing();
+	EXPECT_EQ(m_pOperator->See(middle, 150), alone) << "and goes";
+
 	// An edit is solved at once; numbers are those of what stands now.
 	m_pOperator->ClickRow("targets", 1);
 	m_pOperator->Fill("TargetWeight", "50");
@@ -166,6 +194,12 @@ TEST_F(Motion, IsPlayedJudgedAndLeavesTheDocument)
 	EXPECT_EVENTUALLY(TakeIO::ReadTake(File("hero.bvh").toStdString(), {}, written, error));
 	EXPECT_EQ(written.m_Frames, c_Frames - in);
 	EXPECT_EQ(written.m_Joints.size(), Target()->m_Segments.size());
+
+	EXPECT_EVENTUALLY(Widget<QToolButton>("TakeExport").isEnabled());
+	m_pOperator->AnswerNextDialog(File("hero.glb"));
+	Press("TakeExport");
+	EXPECT_TRUE(Widget<QLabel>("TakeFile").text().contains("Choose its FBX file")) << "a skin is missing";
+	EXPECT_FALSE(QFile::exists(File("hero.glb")));
 
 	Press("TakeStop");
 	m_pOperator->WaitForDrawing();
@@ -193,6 +227,21 @@ TEST_F(Motion, WhatCannotBeReadLeavesTheTakeBefore)
 	EXPECT_EQ(Player().Take(), pTake) << "what was being read is not told of";
 	Press("TakeClose");
 	EXPECT_FALSE(Player().IsShown() || Player().Take());
+}
+
+TEST_F(Window, PlaysAPerformerThatIsMadeOfTheTake)
+{
+	m_pWindow->OpenTake(RETARGET_SOURCE "/demo/walk.bvh", 100);
+	EXPECT_EVENTUALLY(m_pWindow->Motion().Take() && m_pWindow->Motion().AtRest());
+	EXPECT_TRUE(m_pWindow->Motion().IsPerformerMade());
+	auto* const pMake = m_pWindow->findChild<QToolButton*>("TakeMakePerformer");
+	ASSERT_TRUE(pMake && pMake->isVisible());
+	m_pOperator->AnswerNextDialog(File("made.qrs"));
+	QTest::mouseClick(pMake, Qt::LeftButton);
+	EXPECT_EVENTUALLY(m_pOperator->Property("sourceSegments", "count").toInt() > 20);
+	EXPECT_EVENTUALLY(!pMake->isVisible());
+	EXPECT_TRUE(m_pWindow->Motion().IsShown()) << "and goes on";
+	EXPECT_EQ(Run({"check", File("made.qrs"), "--strict"}), "no findings\n");
 }
 
 } // namespace

@@ -90,6 +90,14 @@ void VResidualModel::MakeRows()
 			    QString::fromStdString(TakeSolve::TargetOf(*pSubject, rTarget)), TakeSolve::IsRotationTarget(rTarget)});
 		}
 	}
+	// A weight is no other list: what is chosen, and where the list stands, stay.
+	if (rows.size() == m_Rows.size())
+	{
+		m_Rows = std::move(rows);
+		if (!m_Rows.empty())
+			emit dataChanged(index(0, 0), index(int(m_Rows.size()) - 1, EColumnCount - 1));
+		return;
+	}
 	beginResetModel();
 	m_Rows = std::move(rows);
 	endResetModel();
@@ -110,9 +118,9 @@ double VResidualModel::Value(int i_Row, int i_Column) const
 	const auto row = std::size_t(i_Row);
 	if (i_Column == ENow)
 	{
-		const auto& rpPicture = m_rPlayer.Picture();
-		return m_rPlayer.IsShown() && rpPicture && row < rpPicture->m_Residuals.size() ? rpPicture->m_Residuals[row]
-		                                                                               : c_NotANumber;
+		const auto pPicture = m_rPlayer.Picture();
+		return m_rPlayer.IsShown() && pPicture && row < pPicture->m_Residuals.size() ? pPicture->m_Residuals[row]
+		                                                                             : c_NotANumber;
 	}
 	const auto& rpJudged = m_rPlayer.Judged();
 	if (!rpJudged || row >= rpJudged->m_Report.m_Targets.size() || rpJudged->m_Report.m_Targets[row].m_Frames == 0)

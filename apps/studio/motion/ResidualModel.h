@@ -37,6 +37,8 @@ public:
 	QVariant data(const QModelIndex& i_rIndex, int i_Role) const override;
 	QVariant headerData(int i_Section, Qt::Orientation i_Orientation, int i_Role) const override;
 
+	bool IsRotation(int i_Row) const { return i_Row < int(m_Rows.size()) && m_Rows[std::size_t(i_Row)].m_bRotation; }
+	QString Name(int i_Row) const { return index(i_Row, EName).data().toString(); }
 	/// The frame in which a target is furthest off; nothing before it is known.
 	std::optional<std::size_t> WorstFrame(int i_Row) const;
 

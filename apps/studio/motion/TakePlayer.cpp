@@ -1,5 +1,6 @@
 #include "studio/motion/TakePlayer.h"
 
+#include "CoreOrlexTypes/SubjectApplicationData.h"
 #include "CoreOrlexTypes/SubjectState.h"
 #include "DebugServices/GlobalLog.h"
 
@@ -20,11 +21,26 @@ namespace
 constexpr const char* c_pCategory = "Motion";
 /// Milliseconds; screens show no more pictures.
 constexpr int c_Tick = 16;
+/// What is seen through.
+constexpr CoreOrlexTypes::VColour c_GhostColour{150, 160, 170, 110};
+
+/// The states of one pose the other.
+bool HaveSameJoints(
+    const CoreOrlexTypes::VSubjectParametrised& i_rLeft, const CoreOrlexTypes::VSubjectParametrised& i_rRight)
+{
+	const auto same = [](const auto& i_rOne, const auto& i_rOther)
+	{
+		return i_rOne.m_Name == i_rOther.m_Name && i_rOne.m_ParentSegmentIndex == i_rOther.m_ParentSegmentIndex
+		    && i_rOne.m_Joint.m_JointType == i_rOther.m_Joint.m_JointType;
+	};
+	return std::ranges::equal(i_rLeft.m_Segments, i_rRight.m_Segments, same);
+}
 
 } // namespace
 
-VTakePlayer::VTakePlayer(NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory)
-    : m_pItemFactory(std::move(i_pItemFactory))
+VTakePlayer::VTakePlayer(NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory,
+    NVX::CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory)
+    : m_pItemFactory(std::move(i_pItemFactory)), m_pFrameFactory(std::move(i_pFrameFactory))
 {
 	m_Clock.setTimerType(Qt::PreciseTimer);
 	m_Clock.setInterval(c_Tick);
@@ -38,22 +54,18 @@ VTakePlayer::VTakePlayer(NVX::CountedPointer<TesselPluginInterface::IItemFactory
 			    NVX_LOG(c_pCategory, NVX::ELogWarning, "%1%", rFinding.toStdString());
 		    if (!i_rError.isEmpty())
 		    {
-			    NVX_LOG(c_pCategory, NVX::ELogError, "The take cannot be played: %1%", i_rError.toStdString());
 			    m_bJudging = false;
 			    m_Trouble = i_rError;
 			    Stop();
 			    emit takeChanged();
+			    emit failed(tr("The take cannot be played: %1").arg(i_rError));
 		    }
 	    });
-	connect(&m_Solving, &VTakeSolving::exported, this,
-	    [](const QString& i_rPath, const QString& i_rError)
+	connect(&m_Solving, &VTakeSolving::readOn, this,
+	    [this](double i_Part)
 	    {
-		    if (i_rError.isEmpty())
-			    NVX_LOG(c_pCategory, NVX::ELogInformation, "The character's motion is written to %1%",
-			        i_rPath.toStdString());
-		    else
-			    NVX_LOG(c_pCategory, NVX::ELogError, "The character's motion is not written to %1%: %2%",
-			        i_rPath.toStdString(), i_rError.toStdString());
+		    m_ReadPart = i_Part;
+		    emit solvedChanged();
 	    });
 	connect(&m_Solving, &VTakeSolving::progressed, this,
 	    [this](int i_Solved)
@@ -75,6 +87,7 @@ void VTakePlayer::Open(const QString& i_rPath, std::size_t i_Frame)
 {
 	m_ReadingFrame = i_Frame;
 	m_Reading = QFileInfo(i_rPath).absoluteFilePath();
+	m_ReadPart = 0.0;
 	m_Solving.Read(m_Reading);
 	emit takeChanged();
 }
@@ -84,8 +97,7 @@ void VTakePlayer::TakeRead(
 {
 	m_Reading.clear();
 	if (!i_pTake)
-		NVX_LOG(c_pCategory, NVX::ELogError, "%1% is not opened as a take: %2%", i_rPath.toStdString(),
-		    i_rError.toStdString());
+		emit failed(tr("%1 is not opened as a take: %2").arg(i_rPath, i_rError));
 	else
 	{
 		m_pTake = std::move(i_pTake);
@@ -134,22 +146,14 @@ void VTakePlayer::Cancel()
 	emit solvedChanged();
 }
 
-void VTakePlayer::Export(const QString& i_rPath)
-{
-	if (m_pJudged)
-		m_Solving.Export(i_rPath, m_In, m_Out);
-}
-
 void VTakePlayer::Solve()
 {
 	m_pJudged.reset();
 	m_Solved = 0;
-	m_Trouble = !m_pTake ? QString()
-	    : m_pSource      ? QString()
-	                     : tr("choose the performer's skeleton first; \"retarget performer\" makes one of the take");
+	m_Trouble.clear();
 	m_bStale = true;
-	m_bJudging = m_pTake && m_pSource && m_pTarget && !m_pTarget->m_Targets.empty();
-	if (!m_pTake || !m_pSource)
+	m_bJudging = m_pTake && m_pTarget && !m_pTarget->m_Targets.empty();
+	if (!m_pTake)
 		m_pPicture.reset();
 	m_Solving.Solve({m_pTake, m_pTake ? m_pSource : nullptr, m_pTake ? m_pTarget : nullptr});
 	if (m_pTake)
@@ -166,8 +170,9 @@ void VTakePlayer::TakePicture(std::shared_ptr<const VTakePicture> i_pPicture)
 	if (m_pShownSource != m_pPicture->m_pSource)
 	{
 		m_pShownSource = m_pPicture->m_pSource;
-		m_pSourceItem = m_pItemFactory->CreateItem("FlowSubject");
-		TesselPluginInterface::SetItemValue(m_pSourceItem, m_pShownSource);
+		m_SourceItems = {Item("FlowSubject", m_pShownSource)};
+		if (m_pPicture->m_pSourceData)
+			m_SourceItems.push_back(Item("FlowSubjectApplicationData", m_pPicture->m_pSourceData));
 	}
 	emit pictureChanged();
 	if (m_bShown)
@@ -177,33 +182,36 @@ void VTakePlayer::TakePicture(std::shared_ptr<const VTakePicture> i_pPicture)
 bool VTakePlayer::AtRest() const
 {
 	return !IsReading() && !IsPlaying() && !m_bJudging
-	    && (!m_bShown || !m_pTake || !m_pSource || !m_Trouble.isEmpty()
-	        || (!m_bStale && m_pPicture && m_pPicture->m_Frame == m_Frame));
+	    && (!m_bShown || !m_pTake || !m_Trouble.isEmpty() || (Picture() && Picture()->m_Frame == m_Frame));
+}
+
+template <typename T>
+NVX::CountedPointer<IFlowItem> VTakePlayer::Item(const char* i_pFlowType, std::shared_ptr<const T> i_pValue) const
+{
+	NVX::CountedPointer<IFlowItem> pItem = m_pItemFactory->CreateItem(i_pFlowType);
+	TesselPluginInterface::SetItemValue(pItem, std::move(i_pValue));
+	return pItem;
 }
 
 NVX::CountedPointer<IFlowItem> VTakePlayer::PoseItem(
     const char* i_pFlowType, std::uint32_t i_SubjectId, std::vector<double> i_States) const
 {
-	NVX::CountedPointer<IFlowItem> pItem = m_pItemFactory->CreateItem(i_pFlowType);
-	TesselPluginInterface::SetItemValue(pItem,
-	    std::make_shared<const CoreOrlexTypes::VSubjectDynamicParameters>(
-	        CoreOrlexTypes::VSubjectDynamicParameters{i_SubjectId, std::move(i_States)}));
-	return pItem;
+	using CoreOrlexTypes::VSubjectDynamicParameters;
+	return Item(i_pFlowType,
+	    std::make_shared<const VSubjectDynamicParameters>(VSubjectDynamicParameters{i_SubjectId, std::move(i_States)}));
 }
 
 NVX::CountedPointer<IFlowFrame> VTakePlayer::Shown(const NVX::CountedPointer<IFlowFrame>& i_rpDocument)
 {
 	using CoreOrlexTypes::VSubjectParametrised;
 	m_pDocument = i_rpDocument;
-	auto pSource = ItemValue<VSubjectParametrised>(i_rpDocument->Item("FlowSubjectParametrised"));
-	auto pTarget = ItemValue<VSubjectParametrised>(i_rpDocument->Item("FlowSubjectParametrisedForSolving"));
-	const auto orNone = [](auto& io_rpSubject)
+	const auto subject = [&](const char* i_pFlowType)
 	{
-		if (io_rpSubject && io_rpSubject->m_Segments.empty())
-			io_rpSubject.reset();
+		auto pSubject = i_rpDocument ? ItemValue<VSubjectParametrised>(i_rpDocument->Item(i_pFlowType)) : nullptr;
+		return pSubject && !pSubject->m_Segments.empty() ? pSubject : nullptr;
 	};
-	orNone(pSource);
-	orNone(pTarget);
+	auto pSource = subject("FlowSubjectParametrised");
+	auto pTarget = subject("FlowSubjectParametrisedForSolving");
 	if (pSource != m_pSource || pTarget != m_pTarget)
 	{
 		m_pSource = std::move(pSource);
@@ -211,16 +219,72 @@ NVX::CountedPointer<IFlowFrame> VTakePlayer::Shown(const NVX::CountedPointer<IFl
 		if (m_pTake)
 			Solve();
 	}
-	if (!m_bShown || !m_pTake || !m_pPicture)
-		return {};
-	// Until the edit is solved it is seen in the pose before.
-	NVX::CountedPointer<IFlowFrame> pFrame = i_rpDocument->Copy();
-	pFrame->AddItem(m_pSourceItem);
+	NVX::CountedPointer<IFlowFrame> pFrame = i_rpDocument ? i_rpDocument->Copy() : m_pFrameFactory->CreateFrame();
+	// Never a performer who is gone.
+	if (!m_bShown || !m_pTake || !m_pPicture || m_pPicture->m_Of.m_pSource != m_pSource)
+	{
+		if (i_rpDocument)
+			return {};
+		pFrame->AddItem(NoSubject("FlowSubjectApplicationData"));
+		return pFrame;
+	}
+	for (const auto& rpItem : m_SourceItems)
+		pFrame->AddItem(rpItem);
 	pFrame->AddItem(PoseItem("FlowSubjectDynamicParameters", m_pShownSource->m_SubjectId, m_pPicture->m_SourceStates));
 	if (m_pTarget)
-		pFrame->AddItem(
-		    PoseItem("FlowSubjectDynamicParametersForSolving", m_pTarget->m_SubjectId, m_pPicture->m_TargetStates));
+		pFrame->AddItem(PoseItem("FlowSubjectDynamicParametersForSolving", m_pTarget->m_SubjectId, TargetStates()));
+	AddGhost(*pFrame);
 	return pFrame;
+}
+
+std::vector<double> VTakePlayer::TargetStates() const
+{
+	// Until the edit is solved it is seen in the pose before, where that is one of its joints.
+	const auto& rpSolved = m_pPicture->m_Of.m_pTarget;
+	return rpSolved == m_pTarget || (rpSolved && HaveSameJoints(*rpSolved, *m_pTarget))
+	    ? m_pPicture->m_TargetStates
+	    : TakeSolve::VPosedSubject(*m_pTarget).m_BindPose;
+}
+
+NVX::CountedPointer<IFlowItem> VTakePlayer::NoSubject(const char* i_pDataType) const
+{
+	using CoreOrlexTypes::VSubjectApplicationData;
+	return Item(i_pDataType, std::make_shared<const VSubjectApplicationData>());
+}
+
+std::vector<NVX::CountedPointer<IFlowItem>> VTakePlayer::GhostItems() const
+{
+	constexpr const char* c_pData = "FlowSubjectApplicationDataForRetargeting";
+	if (!m_pGhostOf)
+		return {NoSubject(c_pData)};
+	TakeSolve::VPosedSubject posed(*m_pGhostOf);
+	CoreOrlexTypes::VSubject& rSubject = posed.m_Subject;
+	rSubject.m_Name = tr("Bind pose").toStdString();
+	rSubject.m_Targets.clear();
+	rSubject.m_Markers.clear();
+	CoreOrlexTypes::VSubjectApplicationData look;
+	look.m_Segments.resize(rSubject.m_Segments.size());
+	for (auto& rSegment : look.m_Segments)
+		rSegment.m_Colour = c_GhostColour;
+	return {PoseItem("FlowSubjectDynamicParametersForRetargeting", rSubject.m_SubjectId, std::move(posed.m_BindPose)),
+	    Item("FlowSubjectForRetargeting", std::make_shared<const CoreOrlexTypes::VSubject>(std::move(rSubject))),
+	    Item(c_pData, std::make_shared<const CoreOrlexTypes::VSubjectApplicationData>(std::move(look)))};
+}
+
+void VTakePlayer::AddGhost(IFlowFrame& io_rFrame)
+{
+	const auto pOf = m_bGhost ? m_pTarget : nullptr;
+	if (std::exchange(m_pGhostOf, pOf) != pOf)
+		m_GhostItems = GhostItems();
+	for (const auto& rpItem : m_GhostItems)
+		io_rFrame.AddItem(rpItem);
+}
+
+void VTakePlayer::SetGhost(bool i_bShown)
+{
+	m_bGhost = i_bShown;
+	if (m_bShown)
+		emit shownChanged();
 }
 
 void VTakePlayer::Play()
@@ -321,7 +385,7 @@ void VTakePlayer::Tick()
 
 void VTakePlayer::SetFrame(std::size_t i_Frame)
 {
-	if (i_Frame == m_Frame && !m_bStale && m_pPicture && m_pPicture->m_Frame == i_Frame)
+	if (i_Frame == m_Frame && Picture() && Picture()->m_Frame == i_Frame)
 		return;
 	m_Frame = i_Frame;
 	m_Solving.Show(m_Frame);

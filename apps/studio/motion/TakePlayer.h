@@ -18,7 +18,8 @@ class VTakePlayer : public QObject
 	Q_OBJECT
 
 public:
-	explicit VTakePlayer(NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory);
+	VTakePlayer(NVX::CountedPointer<TesselPluginInterface::IItemFactory> i_pItemFactory,
+	    NVX::CountedPointer<TesselPluginInterface::IFrameFactory> i_pFrameFactory);
 
 	/// Reads it in the background, and shows a frame of it. The take before stays until the new one is read, and if
 	/// that cannot be read.
@@ -27,11 +28,10 @@ public:
 	/// Empty if none is being read.
 	const QString& Reading() const { return m_Reading; }
 	void Close();
+	/// From 0 to 1, of the file that is being read.
+	double ReadPart() const { return m_ReadPart; }
 	/// What goes on in the background ends: reading, or the sequence that is judged.
 	void Cancel();
-	/// Writes the character's motion as BVH, between the in and out points. Only of a take that is judged; what became
-	/// of it is told in the log.
-	void Export(const QString& i_rPath);
 
 	/// Null without a take.
 	const std::shared_ptr<const TakeIO::VTake>& Take() const { return m_pTake; }
@@ -62,9 +62,11 @@ public:
 	void SetLoops(bool i_bLoops) { m_bLoops = i_bLoops; }
 	/// Times the take's own.
 	void SetSpeed(double i_Speed);
+	/// The character stands beside the take in its bind pose, too, in grey bones.
+	void SetGhost(bool i_bShown);
 
-	/// Null before the first frame is shown.
-	const std::shared_ptr<const VTakePicture>& Picture() const { return m_pPicture; }
+	/// Of what the document has now; null until it is solved.
+	std::shared_ptr<const VTakePicture> Picture() const { return m_bStale ? nullptr : m_pPicture; }
 	/// Null until all frames are solved.
 	const std::shared_ptr<const VJudgedTake>& Judged() const { return m_pJudged; }
 	/// Of the sequence in the background, 0 if there is none.
@@ -72,6 +74,8 @@ public:
 	bool IsJudging() const { return m_bJudging; }
 	/// Empty if the take plays; otherwise why not.
 	const QString& Trouble() const { return m_Trouble; }
+	/// The document has no performer: the one that plays is made of the take.
+	bool IsPerformerMade() const { return m_pTake && !m_pSource; }
 	/// What the document has; null for nothing.
 	const std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised>& Target() const { return m_pTarget; }
 	const NVX::CountedPointer<TesselPluginInterface::IFlowFrame>& Document() const { return m_pDocument; }
@@ -94,6 +98,8 @@ signals:
 	/// The document's subjects, or how far they are solved.
 	void solvedChanged();
 	void opened(const QString& i_rPath);
+	/// Why a file was not opened, or why the take cannot be played.
+	void failed(const QString& i_rSentence);
 	/// The answer of Shown would be another one.
 	void shownChanged();
 
@@ -104,13 +110,24 @@ private:
 	void Tick();
 	void SetFrame(std::size_t i_Frame);
 	void StartClock();
+	template <typename T>
+	NVX::CountedPointer<TesselPluginInterface::IFlowItem> Item(
+	    const char* i_pFlowType, std::shared_ptr<const T> i_pValue) const;
 	NVX::CountedPointer<TesselPluginInterface::IFlowItem> PoseItem(
 	    const char* i_pFlowType, std::uint32_t i_SubjectId, std::vector<double> i_States) const;
+	/// The states to draw the document's character with.
+	std::vector<double> TargetStates() const;
+	/// A frame that lacks a subject leaves it as it was: with this item of its class beside it, it goes.
+	NVX::CountedPointer<TesselPluginInterface::IFlowItem> NoSubject(const char* i_pDataType) const;
+	std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>> GhostItems() const;
+	void AddGhost(TesselPluginInterface::IFlowFrame& io_rFrame);
 
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
+	const NVX::CountedPointer<TesselPluginInterface::IFrameFactory> m_pFrameFactory;
 	VTakeSolving m_Solving;
 
 	QString m_Reading;
+	double m_ReadPart = 0.0;
 	/// The first frame that is shown of it.
 	std::size_t m_ReadingFrame = 0;
 	QString m_Path;
@@ -133,11 +150,15 @@ private:
 	std::shared_ptr<const VTakePicture> m_pPicture;
 	/// The performer of the pictures; the same item as long as it is the same performer.
 	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pShownSource;
-	NVX::CountedPointer<TesselPluginInterface::IFlowItem> m_pSourceItem;
+	std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>> m_SourceItems;
+	bool m_bGhost = false;
+	/// The character that it is of; null for none.
+	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pGhostOf;
+	std::vector<NVX::CountedPointer<TesselPluginInterface::IFlowItem>> m_GhostItems;
 	std::shared_ptr<const VJudgedTake> m_pJudged;
 	int m_Solved = 0;
 	bool m_bJudging = false;
-	/// The picture is of an older task.
+	/// The picture is of what was solved before.
 	bool m_bStale = false;
 };
 

@@ -1,13 +1,9 @@
 #include "studio/motion/TakeSolving.h"
 
 #include "ComputeSubjectFK/ConstructionException.h"
-#include "MotionIO/PrintMotion.h"
 #include "TakeIO/ReadTake.h"
 #include "TakeSolve/FreePose.h"
-#include "TakeSolve/PosedSubject.h"
-#include "TakeSolve/SolvedMotion.h"
-#include "UtilsFileSystem/Paths.h"
-#include "UtilsFileSystem/SaveFile.h"
+#include "TakeSolve/Performer.h"
 
 #include <QStringList>
 
@@ -22,6 +18,8 @@ namespace
 
 /// How often the progress of a sequence is told.
 constexpr std::size_t c_ProgressSteps = 200;
+/// Its name is shown over it.
+constexpr const char* c_pMadePerformer = "Performer";
 
 } // namespace
 
@@ -32,6 +30,7 @@ struct VTakeSolving::VPrepared
 	/// Null if the performer cannot be posed.
 	std::shared_ptr<const TakeSolve::VSourceMotion> m_pMotion;
 	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pFreeSource;
+	std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> m_pSourceData;
 	std::shared_ptr<const TakeSolve::VPosedSubject> m_pTarget;
 	/// Null if there is nothing to solve. Each for itself, so that the sequence is what it is without pictures.
 	std::unique_ptr<TakeSolve::VTakeSolve> m_pForPictures;
@@ -88,13 +87,6 @@ void VTakeSolving::Show(std::size_t i_Frame)
 	m_Wake.notify_one();
 }
 
-void VTakeSolving::Export(const QString& i_rPath, std::size_t i_First, std::size_t i_Last)
-{
-	const std::lock_guard lock(m_Mutex);
-	m_Request.m_Export = VExport{i_rPath, i_First, i_Last};
-	m_Wake.notify_one();
-}
-
 template <typename TTell>
 void VTakeSolving::Tell(const std::atomic<std::uint64_t>& i_rLast, std::uint64_t i_Number, TTell i_Tell)
 {
@@ -112,10 +104,9 @@ void VTakeSolving::Run(std::stop_token i_Stop)
 {
 	m_Stop = std::move(i_Stop);
 	std::unique_lock lock(m_Mutex);
-	while (m_Wake.wait(lock, m_Stop,
-	    [this] { return m_Request.m_Path || m_Request.m_Task || m_Request.m_Frame || m_Request.m_Export; }))
+	while (m_Wake.wait(lock, m_Stop, [this] { return m_Request.m_Path || m_Request.m_Task || m_Request.m_Frame; }))
 	{
-		VRequest request = std::exchange(m_Request, {{}, {}, {}, {}, m_Request.m_bSequence});
+		VRequest request = std::exchange(m_Request, {{}, {}, {}, m_Request.m_bSequence});
 		const std::uint64_t readNumber = m_ReadNumber, taskNumber = m_TaskNumber;
 		lock.unlock();
 		Answer(std::move(request), readNumber, taskNumber);
@@ -127,9 +118,6 @@ void VTakeSolving::Answer(VRequest i_Request, std::uint64_t i_ReadNumber, std::u
 {
 	try
 	{
-		// It is of what was solved before.
-		if (i_Request.m_Export)
-			WriteMotion(*i_Request.m_Export);
 		if (i_Request.m_Path)
 			ReadFile(*i_Request.m_Path, i_ReadNumber);
 		if (i_Request.m_Task)
@@ -151,9 +139,17 @@ void VTakeSolving::ReadFile(const QString& i_rPath, std::uint64_t i_Number)
 {
 	const auto pTake = std::make_shared<TakeIO::VTake>();
 	std::string error;
+	TakeIO::VTakeSettings settings;
+	int told = 0;
+	settings.m_Progress = [&](double i_Part)
+	{
+		if (const int step = int(i_Part * c_ProgressSteps); step != std::exchange(told, step))
+			Tell(m_ReadNumber, i_Number, [this, i_Part] { emit readOn(i_Part); });
+		return i_Number == m_ReadNumber && !m_Stop.stop_requested();
+	};
 	try
 	{
-		if (TakeIO::ReadTake(i_rPath.toStdString(), {}, *pTake, error) && pTake->m_Frames == 0)
+		if (TakeIO::ReadTake(i_rPath.toStdString(), settings, *pTake, error) && pTake->m_Frames == 0)
 			error = "The take has no frames";
 	}
 	catch (const std::bad_alloc&)
@@ -179,10 +175,21 @@ void VTakeSolving::Prepare(VSolveTask i_Task, std::uint64_t i_Number)
 		{
 			rNow.m_pMotion = pBefore->m_pMotion;
 			rNow.m_pFreeSource = pBefore->m_pFreeSource;
+			rNow.m_pSourceData = pBefore->m_pSourceData;
 		}
-		else if (i_Task.m_pSource)
+		else if (i_Task.m_pTake)
 		{
-			const TakeSolve::VPosedSubject source(*i_Task.m_pSource);
+			CoreOrlexTypes::VSubjectRecord made;
+			if (!i_Task.m_pSource)
+			{
+				std::vector<TakeSolve::VFinding> ofMaking;
+				made = TakeSolve::MakePerformer(*i_Task.m_pTake, c_pMadePerformer, ofMaking);
+				for (const TakeSolve::VFinding& rFinding : ofMaking)
+					findings << QString::fromStdString(rFinding.m_Message);
+				rNow.m_pSourceData = std::make_shared<const CoreOrlexTypes::VSubjectApplicationData>(
+				    std::move(made.m_SubjectApplicationData));
+			}
+			const TakeSolve::VPosedSubject source(i_Task.m_pSource ? *i_Task.m_pSource : made.m_SubjectParametrised);
 			rNow.m_pMotion =
 			    TakeSolve::VSourceMotion::Make(source.m_Subject, source.m_BindPose, i_Task.m_pTake, {}, error);
 			rNow.m_pFreeSource =
@@ -215,7 +222,9 @@ void VTakeSolving::MakePicture(std::size_t i_Frame)
 	VPrepared& rNow = *m_pPrepared;
 	const auto pPicture = std::make_shared<VTakePicture>();
 	pPicture->m_Frame = i_Frame;
+	pPicture->m_Of = rNow.m_Task;
 	pPicture->m_pSource = rNow.m_pFreeSource;
+	pPicture->m_pSourceData = rNow.m_pSourceData;
 	rNow.m_pMotion->Poses(i_Frame, rNow.m_JointPoses, rNow.m_SourcePoses);
 	TakeSolve::FreeStates(*rNow.m_pFreeSource, rNow.m_SourcePoses, pPicture->m_SourceStates);
 	const TakeSolve::VSolvedTake& rSolved = rNow.m_pSequence->m_Solved;
@@ -239,37 +248,14 @@ void VTakeSolving::MakePicture(std::size_t i_Frame)
 	Tell(m_TaskNumber, rNow.m_Number, [this, pPicture] { emit pictured(pPicture); });
 }
 
-void VTakeSolving::WriteMotion(const VExport& i_rExport)
-{
-	std::string error = "The take is not solved yet";
-	if (m_pPrepared && m_pPrepared->m_pTarget && m_pPrepared->m_pSequence->m_Solved.m_Frames > i_rExport.m_Last)
-	{
-		const TakeSolve::VSolvedTake& rSolved = m_pPrepared->m_pSequence->m_Solved;
-		TakeSolve::VSolvedTake part;
-		part.m_Frames = i_rExport.m_Last + 1 - i_rExport.m_First;
-		part.m_NumberOfStates = rSolved.m_NumberOfStates;
-		const auto first = rSolved.m_States.begin() + std::ptrdiff_t(i_rExport.m_First * part.m_NumberOfStates);
-		part.m_States.assign(first, first + std::ptrdiff_t(part.m_Frames * part.m_NumberOfStates));
-		const TakeIO::VTake motion = TakeSolve::MotionOf(m_pPrepared->m_pTarget->m_Subject,
-		    m_pPrepared->m_pTarget->m_BindPose, part, m_pPrepared->m_Task.m_pTake->m_Rate);
-		std::string bytes;
-		error.clear();
-		if (MotionIO::PrintMotion(motion, MotionIO::EMotionForm::Bvh, nullptr, {}, bytes, error)
-		    == MotionIO::EPrinted::Done)
-			UtilsFileSystem::SaveFile(UtilsFileSystem::PathFromUtf8(i_rExport.m_Path.toStdString()), bytes, error);
-	}
-	QMetaObject::invokeMethod(
-	    this, [this, path = i_rExport.m_Path, text = QString::fromStdString(error)] { emit exported(path, text); },
-	    Qt::QueuedConnection);
-}
-
 void VTakeSolving::Judge()
 {
 	VPrepared& rNow = *m_pPrepared;
 	if (!rNow.m_pForSequence || !rNow.m_pForPictures)
 		return;
 	VJudgedTake& rJudged = *rNow.m_pSequence;
-	rJudged.m_pTarget = {rNow.m_pTarget, &rNow.m_pTarget->m_Subject};
+	rJudged.m_Of = rNow.m_Task;
+	rJudged.m_pTarget = rNow.m_pTarget;
 	if (!TakeSolve::SolveFrames(
 	        *rNow.m_pForSequence, 0, rNow.m_Task.m_pTake->m_Frames - 1,
 	        [this](std::size_t i_Solved, std::size_t i_Frames) { return BetweenFrames(i_Solved, i_Frames); },

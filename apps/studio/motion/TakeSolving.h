@@ -1,7 +1,8 @@
 #pragma once
 
 #include "CoreOrlexTypes/Subject.h"
-#include "CoreOrlexTypes/SubjectParametrised.h"
+#include "CoreOrlexTypes/SubjectRecord.h"
+#include "TakeSolve/PosedSubject.h"
 #include "TakeSolve/SolveReport.h"
 #include "TakeSolve/TakeSolve.h"
 
@@ -25,7 +26,7 @@ namespace StudioHost
 struct VSolveTask
 {
 	std::shared_ptr<const TakeIO::VTake> m_pTake;
-	/// Null where there is none.
+	/// Null where there is none: then a performer is made of the take.
 	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pSource;
 	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pTarget;
 };
@@ -34,8 +35,12 @@ struct VSolveTask
 struct VTakePicture
 {
 	std::size_t m_Frame = 0;
+	/// What it was solved for: states and residuals are of these alone.
+	VSolveTask m_Of;
 	/// The performer on free joints (TakeSolve::WithFreeJoints), and his states; the same object from frame to frame.
 	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pSource;
+	/// Of one that was made of the take; null otherwise.
+	std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> m_pSourceData;
 	std::vector<double> m_SourceStates;
 	/// Of the character; its bind pose if there is nothing that it could follow. Empty without one.
 	std::vector<double> m_TargetStates;
@@ -47,7 +52,8 @@ struct VTakePicture
 /// All frames in sequence, as the command line solves them, and what is judged of them.
 struct VJudgedTake
 {
-	std::shared_ptr<const CoreOrlexTypes::VSubject> m_pTarget;
+	VSolveTask m_Of;
+	std::shared_ptr<const TakeSolve::VPosedSubject> m_pTarget;
 	TakeSolve::VSolvedTake m_Solved;
 	TakeSolve::VSolveReport m_Report;
 };
@@ -62,21 +68,21 @@ class VTakeSolving : public QObject
 
 public:
 	VTakeSolving();
-	/// Waits for the frame that is being solved; for a file that is being read, too.
+	/// Waits for what it is at.
 	~VTakeSolving() override;
 
 	void Read(const QString& i_rPath);
-	/// What is being read is not told of.
+	/// The reading ends, and is not told of.
 	void CancelReading();
 	/// Begins with no picture; the sequence follows by itself.
 	void Solve(VSolveTask i_Task);
 	/// The sequence ends; pictures are still made.
 	void CancelSequence();
 	void Show(std::size_t i_Frame);
-	/// Writes the character's motion as BVH, from a frame to a last one, once the sequence is solved.
-	void Export(const QString& i_rPath, std::size_t i_First, std::size_t i_Last);
 
 signals:
+	/// @param i_Part how much of the file is read, from 0 to 1.
+	void readOn(double i_Part);
 	/// @param i_rError why there is none.
 	void read(const QString& i_rPath, std::shared_ptr<const TakeIO::VTake> i_pTake, const QString& i_rError);
 	/// @param i_rFindings what the operator ought to know of this performer and take together, once for them
@@ -85,24 +91,14 @@ signals:
 	void pictured(std::shared_ptr<const StudioHost::VTakePicture> i_pPicture);
 	void progressed(int i_Solved, int i_Frames);
 	void judged(std::shared_ptr<const StudioHost::VJudgedTake> i_pJudged);
-	/// @param i_rError why it is not written; empty if it is.
-	void exported(const QString& i_rPath, const QString& i_rError);
 
 private:
-	struct VExport
-	{
-		QString m_Path;
-		std::size_t m_First = 0;
-		std::size_t m_Last = 0;
-	};
-
 	/// What the thread is asked for; guarded by the mutex.
 	struct VRequest
 	{
 		std::optional<QString> m_Path;
 		std::optional<VSolveTask> m_Task;
 		std::optional<std::size_t> m_Frame;
-		std::optional<VExport> m_Export;
 		bool m_bSequence = true;
 	};
 
@@ -112,7 +108,6 @@ private:
 	void Prepare(VSolveTask i_Task, std::uint64_t i_Number);
 	void Judge();
 	void MakePicture(std::size_t i_Frame);
-	void WriteMotion(const VExport& i_rExport);
 	/// @return whether the sequence goes on.
 	bool BetweenFrames(std::size_t i_Solved, std::size_t i_Frames);
 	/// Runs it on the thread of this object, unless the number has been raised by then.

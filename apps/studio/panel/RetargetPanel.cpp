@@ -215,7 +215,14 @@ void VRetargetPanel::UpdateStartPage()
 		return !pModel || pModel->rowCount() == 0;
 	};
 	if (m_pStartPage)
-		m_pStartPage->setProperty("visible", isEmpty("SourceSegmentModel") && isEmpty("TargetSegmentModel"));
+		m_pStartPage->setProperty(
+		    "visible", !m_bViewInUse && isEmpty("SourceSegmentModel") && isEmpty("TargetSegmentModel"));
+}
+
+void VRetargetPanel::SetViewInUse(bool i_bInUse)
+{
+	m_bViewInUse = i_bInUse;
+	UpdateStartPage();
 }
 
 void VRetargetPanel::FocusFirstField()

@@ -51,6 +51,8 @@ public:
 	/// A view without subjects shows a button for each of these; the last one is for what the lists of files offer.
 	/// They must outlive the panel.
 	void OfferToBegin(const QList<QAction*>& i_rActions);
+	/// The buttons give way to something that is shown without subjects.
+	void SetViewInUse(bool i_bInUse);
 
 	/// The keyboard goes to what a job begins with.
 	void FocusFirstField();
@@ -167,6 +169,7 @@ private:
 	std::unique_ptr<QObject> m_pDropMark;
 	QList<QAction*> m_StartActions;
 	std::unique_ptr<QObject> m_pStartPage;
+	bool m_bViewInUse = false;
 };
 
 } // namespace StudioHost

@@ -34,9 +34,9 @@ bool IsAnyOpened(const QStringList& i_rFiles)
 
 } // namespace
 
-VFileDrop::VFileDrop(
-    QWidget& i_rWindow, std::function<void(const QStringList&)> i_Mark, std::function<void(const QString&)> i_Open)
-    : QObject(&i_rWindow), m_rWindow(i_rWindow), m_Mark(std::move(i_Mark)), m_Open(std::move(i_Open))
+VFileDrop::VFileDrop(QWidget& i_rWindow, const QWidget& i_rOwn, std::function<void(const QStringList&)> i_Mark,
+    std::function<void(const QString&, bool)> i_Open)
+    : QObject(&i_rWindow), m_rWindow(i_rWindow), m_rOwn(i_rOwn), m_Mark(std::move(i_Mark)), m_Open(std::move(i_Open))
 {
 	// A panel would say yes to every drag and drop it, a field would take the path as text: the drag is taken before
 	// either hears of it.
@@ -73,13 +73,14 @@ bool VFileDrop::eventFilter(QObject* i_pReceiver, QEvent* io_pEvent)
 	if (type == QEvent::DragMove)
 		return true;
 	m_bOver = type == QEvent::DragEnter;
-	m_Mark(m_bOver ? files : QStringList());
+	const bool bOwn = pWidget == &m_rOwn || m_rOwn.isAncestorOf(pWidget);
+	m_Mark(m_bOver && !bOwn ? files : QStringList());
 	if (!m_bOver)
 		QTimer::singleShot(0, this,
-		    [this, files]
+		    [this, files, bOwn]
 		    {
 			    for (const QString& rFile : files)
-				    m_Open(rFile);
+				    m_Open(rFile, bOwn);
 		    });
 	return true;
 }

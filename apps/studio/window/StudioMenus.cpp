@@ -336,7 +336,8 @@ void VStudioWindow::ShowMouseAndKeys()
 	    {tr("an arrow or a square corner, dragged"), tr("moves the root of the target subject")},
 	    {tr("Esc"), tr("ends a drag of the manipulator or a rectangle as if it had not begun")},
 	    {tr("Ctrl+Z and Ctrl+Shift+Z"), tr("undo the last edit and do it again")},
-	    {tr("space, left and right"), tr("play the take that is open, or pause, and step")},
+	    {tr("space, left and right"),
+	        tr("play the take that is open, or pause, and step; home and end go to its ends")},
 	    {tr("Ctrl++ and Ctrl+-"), tr("make the manipulator larger and smaller")},
 	    {tr("Alt+T and Alt+R"), tr("add a position and a rotation target")}};
 	QString text = tr("<b>In the preview</b>") + QStringLiteral("<table cellpadding='3'>");

@@ -59,14 +59,6 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 	new VPlainTexts(this);
 	std::dynamic_pointer_cast<VApplicationObject>(m_pContext->GetApplicationObject())->m_AskToOverwrite =
 	    [this](const std::string& i_rPath) { return MayOverwrite(i_rPath); };
-	new VFileDrop(
-	    *this,
-	    [this](const QStringList& i_rFiles)
-	    {
-		    if (m_pRetargetPanel)
-			    m_pRetargetPanel->MarkDrop(i_rFiles);
-	    },
-	    [this](const QString& i_rFile) { Open(i_rFile); });
 	setDockNestingEnabled(true);
 	// Docks stand where they belong at once.
 	setAnimated(false);
@@ -92,6 +84,16 @@ VStudioWindow::VStudioWindow(QSettings& i_rSettings, bool i_bDeveloper, QWidget*
 
 	MakeMenus(i_bDeveloper);
 	MakeMotionDock();
+	new VFileDrop(
+	    *this, *m_pMotionDock,
+	    [this](const QStringList& i_rFiles)
+	    {
+		    if (m_pRetargetPanel)
+			    m_pRetargetPanel->MarkDrop(i_rFiles);
+	    },
+	    // On the dock an FBX file is motion, elsewhere a character.
+	    [this](const QString& i_rFile, bool i_bOnMotion)
+	    { i_bOnMotion&& KindOf(i_rFile) == EFileKind::EFbx ? OpenTake(i_rFile) : void(Open(i_rFile)); });
 	menuBar()->setCornerWidget(new VSkinProgress(m_pGui->GetSkinCache(), m_pDispatcher));
 	resize(1280, 800);
 }

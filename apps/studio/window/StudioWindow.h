@@ -77,6 +77,8 @@ private:
 	void MakeHelpMenu();
 	void MakeMotionDock();
 	void AskAndOpenTake();
+	/// Of the take that plays: saves it as a file of the operator's choice, and chooses it as the source skeleton.
+	void MakePerformer();
 	QAction* AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText, const QKeySequence& i_rShortcut,
 	    std::function<void()> i_Run);
 	void AskAndOpen(int i_Kind);

@@ -188,17 +188,20 @@ void VRetargetSetupScene::OnSetupChanged()
 void VRetargetSetupScene::RefreshScene()
 {
 	const auto pFrame = m_pRetargetSetup->GetCurrentFrame();
-	if (!pFrame)
-		return;
 	if (const auto pHosts = HostsFrame(pFrame))
 		SetFrame(pHosts);
-	else
+	else if (pFrame)
 	{
 		NVX::CountedPointer<TesselPluginInterface::IFlowFrame> pPosed;
 		m_pSubjectTransform->Transform(pPosed, pFrame, 0);
-		SetFrame(pPosed);
 		if (m_bHostShows)
+		{
+			// The host's subjects go.
+			SetWholeFrame(pPosed);
 			m_pAwaited = pPosed;
+		}
+		else
+			SetFrame(pPosed);
 	}
 	const auto appears = [](const VRetargetSetupCore::VSubjectValues& i_rValues, bool& io_rbShown)
 	{

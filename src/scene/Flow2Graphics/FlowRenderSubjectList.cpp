@@ -29,11 +29,22 @@ VFlowRenderSubjectList::VFlowRenderSubjectList(std::shared_ptr<const ISubjectSel
 		m_Items.Insert(tag);
 }
 
-void VFlowRenderSubjectList::MakeSubjects(const IFlowFrame& i_rFrame)
+void VFlowRenderSubjectList::Clear()
 {
 	m_Subjects.clear();
 	m_Data.clear();
 	m_Markers.clear();
+}
+
+void VFlowRenderSubjectList::Forget()
+{
+	m_Items.Reset();
+	Clear();
+}
+
+void VFlowRenderSubjectList::MakeSubjects(const IFlowFrame& i_rFrame)
+{
+	Clear();
 	// The cache keeps a subject that the frame does not have any more.
 	if (!i_rFrame.Item(m_Items.Cache(m_rTypes.m_Subject)->FlowType()))
 		return;

@@ -23,6 +23,9 @@ public:
 	void Update(const TesselPluginInterface::IFlowFrame& i_rFrame, VFlowContext& io_rContext,
 	    const Flow2TypesUtils::FlowSubjectSceneTransformItem* i_pSceneTransform);
 
+	/// Has no subject until a frame brings one, were it the one from before.
+	void Forget();
+
 	/// Skins are to be looked for again. Any thread.
 	void SetRebind() { m_bRebind = true; }
 	bool IsRebindSet() const { return m_bRebind; }
@@ -33,6 +36,7 @@ public:
 	const std::vector<std::shared_ptr<const VRenderSubjectMarkerData>>& Markers() const { return m_Markers; }
 
 private:
+	void Clear();
 	void MakeSubjects(const TesselPluginInterface::IFlowFrame& i_rFrame);
 
 	const std::shared_ptr<const ISubjectSelectionMaker> m_pSelectionMaker;

@@ -45,6 +45,12 @@ void VFlowRenderSubjectDynamics::Update(const TesselPluginInterface::IFlowFrame&
 	}
 }
 
+void VFlowRenderSubjectDynamics::Forget()
+{
+	for (const std::unique_ptr<VFlowRenderSubjectList>& rpList : m_Lists)
+		rpList->Forget();
+}
+
 void VFlowRenderSubjectDynamics::SetRebind()
 {
 	for (const std::unique_ptr<VFlowRenderSubjectList>& rpList : m_Lists)

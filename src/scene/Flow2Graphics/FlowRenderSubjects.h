@@ -46,6 +46,9 @@ public:
 
 	void Update(const TesselPluginInterface::IFlowFrame& i_rFrame, VFlowContext& io_rContext) override;
 
+	/// As VFlowRenderSubjectList::Forget, of all classes.
+	void Forget();
+
 	/// All subjects look for their skins again. Any thread.
 	void SetRebind();
 

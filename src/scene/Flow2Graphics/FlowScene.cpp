@@ -61,6 +61,12 @@ void VFlowScene::SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame>
 	RequestRefresh();
 }
 
+void VFlowScene::SetWholeFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame)
+{
+	m_bForget = true;
+	SetFrame(std::move(i_pFrame));
+}
+
 template <typename TFlowType, typename TPartner, typename... TArguments>
 std::shared_ptr<TFlowType> VFlowScene::AddFlowType(std::shared_ptr<TPartner> i_pPartner, TArguments&&... i_rArguments)
 {
@@ -131,6 +137,9 @@ bool VFlowScene::Synchronise()
 	if (m_pPendingFrame)
 		m_pFrame = std::move(m_pPendingFrame);
 	m_pPendingFrame.reset();
+	// Here alone no older frame is being updated.
+	if (std::exchange(m_bForget, false) && m_pDynamics)
+		m_pDynamics->Forget();
 	if (m_pPendingMeshes && m_pFBXScene)
 		m_pFBXScene->Set(std::move(std::exchange(m_pPendingMeshes, nullptr)->m_Meshes));
 	// Both threads are here: whoever hears of what is published finds the frame.

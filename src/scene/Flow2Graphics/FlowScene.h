@@ -47,6 +47,8 @@ public:
 
 	/// What is to be shown from the next exchange on. User interface thread.
 	void SetFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame);
+	/// The same of a frame that holds all subjects: one that it lacks is drawn no more, where it otherwise stays.
+	void SetWholeFrame(NVX::CountedPointer<TesselPluginInterface::IFlowFrame> i_pFrame);
 
 	/// The frame that bounds and matrices of items are of; null before the first. User interface thread.
 	const NVX::CountedPointer<TesselPluginInterface::IFlowFrame>& PublishedFrame() const { return m_pPublishedFrame; }
@@ -85,6 +87,7 @@ private:
 	NVX::VConnection m_SkinConnection;
 	/// Of the user interface thread.
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pPendingFrame;
+	bool m_bForget = false;
 	NVX::CountedPointer<TesselPluginInterface::IFlowFrame> m_pPublishedFrame;
 	struct VFBXMeshes;
 	/// Of the user interface thread; null when there are no new ones.

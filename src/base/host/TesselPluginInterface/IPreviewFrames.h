@@ -17,7 +17,8 @@ public:
 	virtual ~IPreviewFrames() = default;
 
 	/// Asked for each frame that the preview would show, so that the host knows what is edited.
-	/// @param i_rpDocument the subjects as the document has them, without poses; it stays as it is.
+	/// @param i_rpDocument the subjects as the document has them, without poses; it stays as it is. Null as long as it
+	/// has none.
 	/// @return what is drawn, with its poses; null for the bind poses. While it is not null nothing can be picked or
 	/// moved by the mouse.
 	virtual NVX::CountedPointer<IFlowFrame> Shown(const NVX::CountedPointer<IFlowFrame>& i_rpDocument) = 0;
