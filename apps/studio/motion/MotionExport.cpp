@@ -18,7 +18,7 @@ namespace StudioHost
 namespace
 {
 
-constexpr double c_ProgressSteps = 200.0;
+constexpr double c_WritingSteps = 200.0;
 
 std::optional<MotionIO::EMotionForm> FormOf(const QString& i_rPath)
 {
@@ -113,7 +113,7 @@ QString VMotionExport::Write(const VMotionExportTask& i_rTask)
 	settings.m_Scale = RetargetSetup::GetGlobalScale(*i_rTask.m_pJudged->m_Of.m_pTarget);
 	settings.m_Progress = [this, told = 0.0](double i_Part) mutable
 	{
-		if (i_Part - told >= 1.0 / c_ProgressSteps)
+		if (i_Part - told >= 1.0 / c_WritingSteps)
 			QMetaObject::invokeMethod(
 			    this,
 			    [this, part = told = i_Part]
