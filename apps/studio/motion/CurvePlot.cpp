@@ -95,7 +95,7 @@ void VCurvePlot::SetCurves(const QVector<VCurve>& i_rCurves, double i_Last)
 		(rCurve.m_bRight ? bRight : bLeft) = true;
 		const int axis = rCurve.m_bRight ? QwtPlot::yRight : QwtPlot::yLeft;
 		const QColor colour = c_Colours[m_Marks.size() % int(std::size(c_Colours))];
-		auto* const pCurve = new QwtPlotCurve(rCurve.m_Name);
+		auto* const pCurve = new QwtPlotCurve(QwtText(rCurve.m_Name, QwtText::PlainText));
 		pCurve->setPen(colour, 1.5, rCurve.m_bRight ? Qt::DashLine : Qt::SolidLine);
 		pCurve->setSamples(rCurve.m_Points);
 		pCurve->setYAxis(axis);
