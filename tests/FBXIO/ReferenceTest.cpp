@@ -7,8 +7,11 @@
 
 #include <nlohmann/json.hpp>
 
+#include <array>
+#include <cmath>
 #include <filesystem>
 #include <map>
+#include <set>
 
 using namespace FBXIO;
 
@@ -163,16 +166,61 @@ TEST_P(ReferenceFile, ClustersAgree)
 		EXPECT_EQ(counts[rMesh["name"]], rMesh["skinClusters"]) << rMesh["name"];
 }
 
+/// What bones move, against the vertices as they are drawn, whose weights are rounded.
+void ExpectBoneSkins(const VSkin& i_rSkin)
+{
+	std::vector<std::array<double, 4>> sums(i_rSkin.m_pSkeleton->size());
+	double whole = 0.0;
+	for (const VSkinMesh& rMesh : i_rSkin.m_Meshes)
+	{
+		// A vertex at a seam stands there several times.
+		std::set<std::array<float, 3>> seen;
+		for (const VSkinVertex& rVertex : rMesh.m_Vertices)
+			for (std::size_t i = 0; i < 4 && (i > 0 || seen.insert(rVertex.m_Position).second); ++i)
+			{
+				const Rotation::VMatrix4& rBind = (*i_rSkin.m_pSkeleton)[rVertex.m_BoneIndices[i]].m_InverseBind;
+				auto& rSum = sums[rVertex.m_BoneIndices[i]];
+				const double weight = rVertex.m_BoneWeights[i];
+				whole += weight;
+				rSum[3] += weight;
+				for (int row = 0; row < 3; ++row)
+				{
+					double place = rBind(row, 3);
+					double scale = 0.0;
+					for (int column = 0; column < 3; ++column)
+					{
+						place += rBind(row, column) * rVertex.m_Position[std::size_t(column)];
+						scale += rBind(row, column) * rBind(row, column);
+					}
+					rSum[std::size_t(row)] += weight * place / std::sqrt(scale);
+				}
+			}
+	}
+	for (std::size_t i = 0; i < sums.size(); ++i)
+	{
+		const auto& rBone = (*i_rSkin.m_pSkeleton)[i];
+		ASSERT_TRUE(rBone.m_Skin) << rBone.m_Name;
+		EXPECT_NEAR(rBone.m_Skin->m_Share, sums[i][3] / whole, 0.02) << rBone.m_Name;
+		// The drawn vertices are in the scale of the bones, what is compared in that of the world.
+		const bool bOfWorldScale = std::abs(rBone.m_AccumulatedScale - 1.0f) < 0.01f;
+		for (std::size_t axis = 0; axis < 3 && bOfWorldScale && rBone.m_Skin->m_Share > 0.005; ++axis)
+			EXPECT_NEAR(rBone.m_Skin->m_Centre[axis], sums[i][axis] / sums[i][3], 0.25 * rBone.m_Skin->m_Spread + 1.0)
+			    << rBone.m_Name;
+	}
+}
+
 TEST_P(ReferenceFile, SkinsAgree)
 {
 	const nlohmann::json reference = Reference(GetParam());
 	FBXReader reader;
 	ASSERT_TRUE(reader.LoadFile(c_Folder + GetParam() + ".fbx"));
+	reader.ReadBoneSkins();
 	VSkin skin;
 	reader.ReadSkin(skin);
 	EXPECT_EQ(skin.m_Meshes.size(), reference["skins"]);
 	if (skin.m_Meshes.empty())
 		return;
+	ExpectBoneSkins(skin);
 	std::size_t bound = 0;
 	for (std::size_t i = 0; i < skin.m_pSkeleton->size(); ++i)
 	{

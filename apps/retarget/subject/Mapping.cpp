@@ -58,8 +58,7 @@ VMapped ProposeForSubject(VSession& io_rSession)
 {
 	if (io_rSession.m_Root)
 		return ProposeForFile(io_rSession, io_rSession.m_Root);
-	const auto values = io_rSession.Document().TargetValues();
-	return Mapped(io_rSession, RetargetSetup::RestOf(*values.m_pParametrised, *values.m_pSubject));
+	return Mapped(io_rSession, io_rSession.Document().TargetSkeleton());
 }
 
 void AddProposedTargets(VSession& io_rSession)

@@ -343,6 +343,20 @@ void FBXIO::FBXMeshReader::FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t
 		    });
 }
 
+void FBXIO::FBXMeshReader::AddBoneSkins(
+    FbxNode& i_rNode, std::vector<VBoneSkinSums>& io_rSums, std::set<const FbxObject*>& io_rSeen) const
+{
+	FbxSkin* const pSkin = FindSkin(i_rNode);
+	FbxMesh* const pMesh = pSkin && io_rSeen.insert(pSkin).second ? i_rNode.GetMesh() : nullptr;
+	if (pMesh)
+		ForEachCluster(*pSkin,
+		    [&](FbxCluster& i_rCluster)
+		    {
+			    if (const auto found = m_BoneOfName.find(i_rCluster.GetLink()->GetName()); found != m_BoneOfName.end())
+				    io_rSums[std::size_t(found->second)].Add(i_rCluster, *pMesh);
+		    });
+}
+
 std::shared_ptr<const VSkinSkeleton> FBXIO::FBXMeshReader::PruneSkeleton(std::set<std::int64_t> i_Bones)
 {
 	const std::shared_ptr<VSkinSkeleton> pFull = m_pSkeleton;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "FBXIO/BoneSkins.h"
 #include "FBXIO/ImageCache.h"
 #include "FBXIO/Limits.h"
 #include "FBXIO/Mesh.h"
@@ -48,6 +49,11 @@ public:
 	/// Adds the bones that the node's skin is bound to, with all their parents. A skin that several nodes share is
 	/// looked at once.
 	void FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t>& io_rBones);
+
+	/// Adds what the bones move of the node's mesh, one for each of the skeleton, unless its skin was seen before.
+	/// Tells nothing.
+	void AddBoneSkins(
+	    FbxNode& i_rNode, std::vector<VBoneSkinSums>& io_rSums, std::set<const FbxObject*>& io_rSeen) const;
 
 	/// Makes the skeleton of these bones and of all below them, and goes on with it.
 	std::shared_ptr<const VSkinSkeleton> PruneSkeleton(std::set<std::int64_t> i_Bones);

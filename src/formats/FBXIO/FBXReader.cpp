@@ -10,6 +10,7 @@
 
 #include <functional>
 #include <map>
+#include <set>
 #include <vector>
 
 class FBXIO::FBXReader::VImpl
@@ -337,4 +338,17 @@ void FBXIO::FBXReader::ReadSkin(VSkin& o_rSkin)
 	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.FindUsedBones(i_rNode, bones); });
 	o_rSkin.m_pSkeleton = m_pImpl->m_MeshReader.PruneSkeleton(std::move(bones));
 	m_pImpl->ReadEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.ReadSkinMesh(i_rNode, o_rSkin.m_Meshes); });
+}
+
+void FBXIO::FBXReader::ReadBoneSkins()
+{
+	if (!HasSkeleton())
+		return;
+	VSkinSkeleton& rBones = *m_pImpl->m_pSkeleton;
+	std::vector<VBoneSkinSums> sums(rBones.size());
+	std::set<const FbxObject*> seen;
+	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.AddBoneSkins(i_rNode, sums, seen); });
+	const std::vector<VBoneSkin> skins = BoneSkinsOf(sums, m_pImpl->m_UnitScale);
+	for (std::size_t i = 0; i < skins.size(); ++i)
+		rBones[i].m_Skin = skins[i];
 }

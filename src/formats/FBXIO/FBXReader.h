@@ -66,6 +66,10 @@ public:
 	/// at most once. Does nothing without a skeleton; the reader's own skeleton stays as it is.
 	void ReadSkin(VSkin& o_rSkin);
 
+	/// Finds what the bones of GetSkeleton move, without meshes being built and without a word. Before ReadSkin, if
+	/// both are called.
+	void ReadBoneSkins();
+
 private:
 	class VImpl;
 	std::unique_ptr<VImpl> m_pImpl;

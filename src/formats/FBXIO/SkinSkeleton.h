@@ -1,8 +1,10 @@
 #pragma once
 
+#include "FBXIO/BoneSkin.h"
 #include "numerics/Matrix4.h"
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -25,6 +27,8 @@ struct VSkinBone
 	std::int64_t m_ParentIndex = -1;
 	/// Product of the local X scalings from the scene root down to this node; the unit scale is not in it.
 	float m_AccumulatedScale = 1.0f;
+	/// Nothing unless FBXReader::ReadBoneSkins found a skin.
+	std::optional<VBoneSkin> m_Skin = std::nullopt;
 };
 
 /// Bones in pre-order of the node tree: a parent stands before its children.

@@ -2,6 +2,7 @@
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "RetargetSetupCore/BindPose.h"
+#include "RetargetSetupCore/GlobalScale.h"
 #include "RetargetSetupCore/TargetConstruction.h"
 
 using CoreOrlexTypes::VSubjectParametrised;
@@ -10,7 +11,25 @@ using SetupProposal::VRestSkeleton;
 namespace RetargetSetup
 {
 
-VRestSkeleton RestOf(const VSubjectParametrised& i_rParametrised, const CoreOrlexTypes::VSubject& i_rSubject)
+namespace
+{
+
+std::optional<SetupProposal::VRestSkin> SkinAtRest(
+    const FBXIO::VSkinBone& i_rBone, const Rotation::VPose<double>& i_rPose, double i_Scale)
+{
+	if (!i_rBone.m_Skin)
+		return std::nullopt;
+	SetupProposal::VRestSkin skin{i_rBone.m_Skin->m_Share, i_rPose.t, i_Scale * i_rBone.m_Skin->m_Spread};
+	for (std::size_t row = 0; row < 3; ++row)
+		for (std::size_t axis = 0; axis < 3; ++axis)
+			skin.m_Centre[row] += i_Scale * i_rPose.R[3 * row + axis] * i_rBone.m_Skin->m_Centre[axis];
+	return skin;
+}
+
+} // namespace
+
+VRestSkeleton RestOf(const VSubjectParametrised& i_rParametrised, const CoreOrlexTypes::VSubject& i_rSubject,
+    const FBXIO::VSkinSkeleton& i_rBones)
 {
 	VRestSkeleton skeleton;
 	const auto pFK = KinematicsInBindPose(i_rParametrised, i_rSubject, "compared");
@@ -22,7 +41,8 @@ VRestSkeleton RestOf(const VSubjectParametrised& i_rParametrised, const CoreOrle
 		const VSubjectParametrised::VSegment& rSegment = i_rParametrised.m_Segments[i];
 		const std::uint32_t parent = i_rSubject.m_Segments[i].m_ParentSegmentIndex;
 		skeleton.push_back({rSegment.m_Name, parent == CoreOrlexTypes::c_NoParent ? -1 : std::int64_t(parent),
-		    poses[i].t, rSegment.m_Joint.m_JointType != VSubjectParametrised::VJoint::EDummy});
+		    poses[i].t, rSegment.m_Joint.m_JointType != VSubjectParametrised::VJoint::EDummy,
+		    i < i_rBones.size() ? SkinAtRest(i_rBones[i], poses[i], GetGlobalScale(i_rParametrised)) : std::nullopt});
 	}
 	return skeleton;
 }
@@ -32,8 +52,8 @@ VRestSkeleton RestOf(const FBXIO::VSkinSkeleton& i_rSkeleton, const Rotation::VM
 	VRestSkeleton skeleton;
 	const std::vector<Rotation::VPose<double>> poses = PosesInFile(i_rSkeleton, i_rAxis, 1.0);
 	for (std::size_t i = 0; i < i_rSkeleton.size(); ++i)
-		skeleton.push_back(
-		    {std::string(StripNamespace(i_rSkeleton[i].m_Name)), i_rSkeleton[i].m_ParentIndex, poses[i].t, true});
+		skeleton.push_back({std::string(StripNamespace(i_rSkeleton[i].m_Name)), i_rSkeleton[i].m_ParentIndex,
+		    poses[i].t, true, SkinAtRest(i_rSkeleton[i], poses[i], 1.0)});
 	return skeleton;
 }
 

@@ -244,6 +244,10 @@ public:
 	/// Turns the FBX file's space into one with Z up.
 	const Rotation::VMatrix4& GetTargetAxisMatrix() const { return m_TargetAxisMatrix; }
 
+	/// The target subject in its bind pose, with what its segments move of the skin if the FBX file that it was made of
+	/// is the one that was read last. Empty without one.
+	SetupProposal::VRestSkeleton TargetSkeleton() const;
+
 	/// Fires at the end of every change, before LoadTargetSubject has taken over the source name: callbacks go through
 	/// a dispatcher and read what stands when they run.
 	NVX::VSignal<>& GetChangedSignal() { return m_ChangedSignal; }

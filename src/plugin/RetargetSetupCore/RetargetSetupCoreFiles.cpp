@@ -145,6 +145,7 @@ bool VRetargetSetupCore::LoadTargetFBX(const boost::filesystem::path& i_rPath)
 	if (!bLoaded)
 		return false;
 	m_bTargetFBXComplete = reader.IsComplete();
+	reader.ReadBoneSkins();
 	m_pFBXSkeleton = reader.GetSkeleton();
 	if (!m_pFBXSkeleton || m_pFBXSkeleton->empty())
 	{

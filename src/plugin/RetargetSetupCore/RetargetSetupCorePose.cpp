@@ -4,6 +4,7 @@
 #include "RetargetSetupCore/FilePose.h"
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
+#include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RootHeight.h"
 #include "RetargetSetupCore/StepNames.h"
@@ -25,6 +26,14 @@ FBXIO::VSkinSkeleton VRetargetSetupCore::BonesOfTarget() const
 	    || target.m_pApplicationData->m_Skin != m_TargetName)
 		return {};
 	return RetargetSetup::BonesOfSegments(*target.m_pParametrised, *m_pFBXSkeleton, m_TargetRootIndex);
+}
+
+SetupProposal::VRestSkeleton VRetargetSetupCore::TargetSkeleton() const
+{
+	const VSubjectValues target = TargetValues();
+	if (!target.m_pParametrised)
+		return {};
+	return RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject, BonesOfTarget());
 }
 
 std::optional<RetargetSetup::VPoseDifference> VRetargetSetupCore::DifferenceFromFile() const

@@ -208,7 +208,7 @@ std::optional<SetupProposal::VProposal> VRetargetSetupCore::ProposeTargets(doubl
 	if (!both)
 		return std::nullopt;
 	return SetupProposal::Propose(RetargetSetup::RestOf(*both->m_Source.m_pParametrised, *both->m_Source.m_pSubject),
-	    RetargetSetup::RestOf(*both->m_Target.m_pParametrised, *both->m_Target.m_pSubject), i_LeastScore);
+	    TargetSkeleton(), i_LeastScore);
 }
 
 std::optional<SetupProposal::VAlignment> VRetargetSetupCore::AlignToSource(

@@ -21,6 +21,12 @@ constexpr double c_Agree = 0.6;
 constexpr double c_FeetBelow = 0.14;
 /// Shorter directions than this part of the height tell nothing.
 constexpr double c_Tells = 0.004;
+/// Both feet, which point farther to the front than this in all, outvote the names.
+constexpr double c_ClearlyTells = 0.04;
+/// Limbs that begin outside of these parts of the height, or nearer to each other, tell no proportions.
+constexpr double c_LowestLegs = 0.15;
+constexpr double c_HighestArms = 0.97;
+constexpr double c_ShortestTrunk = 0.1;
 
 struct VFlat
 {
@@ -124,21 +130,37 @@ VFlat AcrossByTwins(const VRestSkeleton& i_rSkeleton, const std::vector<std::int
 	return {std::cos(angle), std::sin(angle)};
 }
 
-/// Where the lowest bones point.
-VFlat FrontByFeet(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame)
+/// Where the lowest bones point, with what they move of the skin, and how long all of them are.
+struct VFeet
 {
-	VFlat sum;
+	VFlat m_Sum;
+	double m_Length = 0.0;
+
+	void Add(const Rotation::VVector3& i_rFrom, const Rotation::VVector3& i_rTo)
+	{
+		const VFlat way{i_rTo[0] - i_rFrom[0], i_rTo[1] - i_rFrom[1]};
+		m_Sum = {m_Sum.x + way.x, m_Sum.y + way.y};
+		m_Length += std::hypot(way.x, way.y);
+	}
+};
+
+VFeet FrontByFeet(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame)
+{
+	const auto isLow = [&](const Rotation::VVector3& i_rPlace)
+	{ return i_rPlace[2] - i_rFrame.m_Floor <= c_FeetBelow * i_rFrame.m_Height; };
+	VFeet feet;
 	for (const VRestJoint& rJoint : i_rSkeleton)
 	{
-		if (rJoint.m_Parent < 0)
+		// What moves no skin beside what does is a control.
+		const bool bControl = rJoint.m_Skin && rJoint.m_Skin->m_Share <= 0.0;
+		if (bControl || !isLow(rJoint.m_Place))
 			continue;
-		const auto& rParent = i_rSkeleton[std::size_t(rJoint.m_Parent)].m_Place;
-		if (std::max(rParent[2], rJoint.m_Place[2]) - i_rFrame.m_Floor > c_FeetBelow * i_rFrame.m_Height)
-			continue;
-		sum.x += rJoint.m_Place[0] - rParent[0];
-		sum.y += rJoint.m_Place[1] - rParent[1];
+		if (rJoint.m_Parent >= 0 && isLow(i_rSkeleton[std::size_t(rJoint.m_Parent)].m_Place))
+			feet.Add(i_rSkeleton[std::size_t(rJoint.m_Parent)].m_Place, rJoint.m_Place);
+		if (rJoint.m_Skin)
+			feet.Add(rJoint.m_Place, rJoint.m_Skin->m_Centre);
 	}
-	return sum;
+	return feet;
 }
 
 /// The horizontal direction whose plane mirrors the joints best.
@@ -199,11 +221,12 @@ VBodyFrame BodyFrameOf(const VRestSkeleton& i_rSkeleton, const std::vector<VName
 	if (across.x == 0.0 && across.y == 0.0)
 		across = AcrossByShape(i_rSkeleton, frame.m_Height);
 	// Up times the front is left.
-	const VFlat feet = FrontByFeet(i_rSkeleton, frame);
-	const double front = Dot(feet, {across.y, -across.x});
+	const VFeet feet = FrontByFeet(i_rSkeleton, frame);
+	const double front = Dot(feet.m_Sum, {across.y, -across.x});
 	frame.m_bFrontByFeet = std::abs(front) > c_Tells * frame.m_Height;
 	frame.m_bContradiction = frame.m_bFrontByFeet && frame.m_bSidesByName && front < 0.0;
-	if (frame.m_bFrontByFeet && !frame.m_bSidesByName && front < 0.0)
+	const bool bClear = std::abs(front) > std::max(c_ClearlyTells * frame.m_Height, c_Agree * feet.m_Length);
+	if (frame.m_bFrontByFeet && front < 0.0 && (!frame.m_bSidesByName || bClear))
 		across = {-across.x, -across.y};
 
 	frame.m_Left = {across.x, across.y, 0.0};
@@ -219,6 +242,19 @@ VBodyPlace PlaceIn(const VBodyFrame& i_rFrame, const Rotation::VVector3& i_rPlac
 	return {(from[0] * i_rFrame.m_Left[0] + from[1] * i_rFrame.m_Left[1]) / i_rFrame.m_Height,
 	    (from[0] * i_rFrame.m_Forward[0] + from[1] * i_rFrame.m_Forward[1]) / i_rFrame.m_Height,
 	    (i_rPlace[2] - i_rFrame.m_Floor) / i_rFrame.m_Height};
+}
+
+double UsualUp(const VBodyFrame& i_rFrame, double i_Up)
+{
+	const double legs = i_rFrame.m_LegsUp;
+	const double arms = i_rFrame.m_ArmsUp;
+	if (legs < c_LowestLegs || arms > c_HighestArms || arms - legs < c_ShortestTrunk)
+		return i_Up;
+	if (i_Up < legs)
+		return i_Up * c_UsualLegsUp / legs;
+	if (i_Up < arms)
+		return c_UsualLegsUp + (i_Up - legs) * (c_UsualArmsUp - c_UsualLegsUp) / (arms - legs);
+	return c_UsualArmsUp + (i_Up - arms) * (1.0 - c_UsualArmsUp) / (1.0 - arms);
 }
 
 } // namespace SetupProposal

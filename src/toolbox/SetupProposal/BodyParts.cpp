@@ -4,11 +4,13 @@
 #include "SetupProposal/LimbVote.h"
 #include "SetupProposal/PartWords.h"
 #include "SetupProposal/RestPoseVote.h"
+#include "SetupProposal/SkinVote.h"
 #include "SetupProposal/TreeVote.h"
 #include "SetupProposal/Twins.h"
 
 #include <algorithm>
 #include <cmath>
+#include <initializer_list>
 
 namespace SetupProposal
 {
@@ -22,7 +24,9 @@ constexpr double c_NotTheName = -4.0;
 constexpr double c_Central = 0.012;
 constexpr double c_SamePart = 0.004;
 /// How much each tells of a side.
-constexpr double c_SideByName = 1.0;
+constexpr double c_SideByName = 0.6;
+/// Where the feet tell that all names are of the other side.
+constexpr double c_SideByContradictedName = 0.3;
 constexpr double c_SideByPlace = 0.9;
 constexpr double c_SideByParent = 0.8;
 constexpr double c_LeastSide = 0.2;
@@ -51,10 +55,11 @@ std::vector<double> LeftOfPlane(const VRestSkeleton& i_rSkeleton, const std::vec
 void ReadSides(const VRestSkeleton& i_rSkeleton, VBodyReading& io_rBody)
 {
 	const std::vector<double> left = LeftOfPlane(i_rSkeleton, io_rBody.m_Joints);
+	const double byName = io_rBody.m_Frame.m_bContradiction ? c_SideByContradictedName : c_SideByName;
 	for (std::size_t i = 0; i < i_rSkeleton.size(); ++i)
 	{
 		VJointReading& rJoint = io_rBody.m_Joints[i];
-		double side = Signed(io_rBody.m_Names[i].m_Side, c_SideByName);
+		double side = Signed(io_rBody.m_Names[i].m_Side, byName);
 		if (std::abs(left[i]) > c_Central)
 			side += left[i] > 0.0 ? c_SideByPlace : -c_SideByPlace;
 		if (const std::int64_t parent = i_rSkeleton[i].m_Parent;
@@ -107,6 +112,7 @@ void ReadChains(const VRestSkeleton& i_rSkeleton, VBodyReading& io_rBody)
 				if (rJoints[std::size_t(k)].m_Part == ESpine && i_rSkeleton[std::size_t(k)].m_bMoves)
 				{
 					rJoints[std::size_t(k)].m_bCarriesArms = true;
+					io_rBody.m_bBackCarriesArms = true;
 					break;
 				}
 	}
@@ -150,6 +156,22 @@ void ReadAlong(
 	}
 }
 
+/// How high the joints stand that are one of these parts by their names, as a part of the height.
+std::optional<double> UpByNames(
+    const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody, std::initializer_list<EBodyPart> i_Parts)
+{
+	double sum = 0.0;
+	double weights = 0.0;
+	for (std::size_t i = 0; i < i_rSkeleton.size(); ++i)
+		if (const auto scores = PartsByName(i_rBody.m_Names[i]))
+			for (const EBodyPart part : i_Parts)
+			{
+				sum += (*scores)[part] * PlaceIn(i_rBody.m_Frame, i_rSkeleton[i].m_Place).m_Up;
+				weights += (*scores)[part];
+			}
+	return weights > 0.0 ? std::optional(sum / weights) : std::nullopt;
+}
+
 } // namespace
 
 VBodyReading ReadBody(const VRestSkeleton& i_rSkeleton)
@@ -163,8 +185,17 @@ VBodyReading ReadBody(const VRestSkeleton& i_rSkeleton)
 	body.m_Frame = BodyFrameOf(i_rSkeleton, body.m_Names, twins);
 	body.m_Joints.resize(i_rSkeleton.size());
 
+	const VLimbVotes limbs = VoteByLimbs(i_rSkeleton, body.m_Frame);
+	const auto legsUp = limbs.m_LegsUp ? limbs.m_LegsUp : UpByNames(i_rSkeleton, body, {EThigh});
+	const auto armsUp = limbs.m_ArmsUp ? limbs.m_ArmsUp : UpByNames(i_rSkeleton, body, {EClavicle, EUpperArm});
+	if (legsUp && armsUp)
+	{
+		body.m_Frame.m_LegsUp = *legsUp;
+		body.m_Frame.m_ArmsUp = *armsUp;
+	}
+	const std::vector<VPartLogs>& rByLimbs = limbs.m_Logs;
 	const std::vector<VPartLogs> byRestPose = VoteByRestPose(i_rSkeleton, body.m_Frame);
-	const std::vector<VPartLogs> byLimbs = VoteByLimbs(i_rSkeleton, body.m_Frame);
+	const std::vector<VPartLogs> bySkin = VoteBySkin(i_rSkeleton, body.m_Frame);
 	std::vector<VPartLogs> votes = byRestPose;
 	for (std::size_t i = 0; i < votes.size(); ++i)
 	{
@@ -172,8 +203,10 @@ VBodyReading ReadBody(const VRestSkeleton& i_rSkeleton)
 		rJoint.m_Place = PlaceIn(body.m_Frame, i_rSkeleton[i].m_Place);
 		rJoint.m_Twin = twins[i];
 		rJoint.m_ByRestPose = byRestPose[i];
+		if (i_rSkeleton[i].m_Skin)
+			rJoint.m_BySkin = bySkin[i];
 		for (std::size_t part = 0; part < c_BodyParts; ++part)
-			votes[i][part] += byLimbs[i][part];
+			votes[i][part] += rByLimbs[i][part] + bySkin[i][part];
 		rJoint.m_ByName = PartsByName(body.m_Names[i]);
 		for (std::size_t part = 0; rJoint.m_ByName && part < c_BodyParts; ++part)
 			votes[i][part] += std::max(c_NotTheName, std::log(std::max((*rJoint.m_ByName)[part], 1e-9)));

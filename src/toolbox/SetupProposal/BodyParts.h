@@ -18,7 +18,9 @@ struct VJointReading
 	/// Nothing if the name tells none.
 	std::optional<VPartScores> m_ByName;
 	VPartLogs m_ByRestPose{};
-	/// Probabilities of the parts by names, rest pose and the place in the tree together; they sum to 1.
+	/// Nothing if no skin is known.
+	std::optional<VPartLogs> m_BySkin;
+	/// Probabilities of the parts by names, rest pose, skin and the place in the tree together; they sum to 1.
 	VPartScores m_Likely{};
 	EBodyPart m_Part = EOther;
 	ESide m_Side = ESide::None;
@@ -41,9 +43,11 @@ struct VBodyReading
 	VBodyFrame m_Frame;
 	std::vector<VNameWords> m_Names;
 	std::vector<VJointReading> m_Joints;
+	/// Whether the arms hang on any joint of the back at all.
+	bool m_bBackCarriesArms = false;
 };
 
-/// What each joint of a skeleton is. Names, tree and rest pose vote, and any two of them may outvote the third.
+/// What each joint of a skeleton is. Names, tree, rest pose and skin vote, and any two of them may outvote another.
 VBodyReading ReadBody(const VRestSkeleton& i_rSkeleton);
 
 } // namespace SetupProposal

@@ -34,6 +34,8 @@ constexpr std::size_t c_ArmJoints = 3;
 constexpr double c_OtherRegion = -2.5;
 /// How much nearer to the legs, as a part of the height, another joint must stand.
 constexpr double c_Nearer = 0.01;
+/// The joint that arms hang on stands no lower beneath them than this part of the height.
+constexpr double c_HangsTooLow = 0.2;
 /// A joint of a limb or of the trunk is rather some part, however odd the pose.
 constexpr double c_HelperOnTheWay = -1.5;
 /// What stands beside the way from the legs to the head, and twins that are no limbs.
@@ -157,7 +159,7 @@ ERegion RegionOfTrunk(const VRestSkeleton& i_rSkeleton, std::int64_t i_Joint, st
 
 } // namespace
 
-std::vector<VPartLogs> VoteByLimbs(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame)
+VLimbVotes VoteByLimbs(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame)
 {
 	const std::vector<std::int64_t> twins = FindTwins(i_rSkeleton);
 	const std::vector<std::int64_t> mainChildren = MainChildren(i_rSkeleton);
@@ -181,19 +183,29 @@ std::vector<VPartLogs> VoteByLimbs(const VRestSkeleton& i_rSkeleton, const VBody
 				arms.Offer(i_rSkeleton, i, std::size_t(twins[i]), own.m_Length);
 		}
 	}
-	std::vector<VPartLogs> votes(i_rSkeleton.size());
+	VLimbVotes limbs;
+	std::vector<VPartLogs>& rVotes = limbs.m_Logs;
+	rVotes.resize(i_rSkeleton.size());
+	if (legs.m_Joint >= 0)
+		limbs.m_LegsUp = PlaceIn(i_rFrame, legs.m_Middle).m_Up;
+	if (arms.m_Joint >= 0)
+		limbs.m_ArmsUp = PlaceIn(i_rFrame, arms.m_Middle).m_Up;
 	legs.m_Joint = BelongTo(i_rSkeleton, legs, i_rFrame.m_Height);
+	// Arms that hang far below where they begin tell nothing of the trunk.
+	if (arms.m_Joint >= 0
+	    && arms.m_Middle[2] - i_rSkeleton[std::size_t(arms.m_Joint)].m_Place[2] > c_HangsTooLow * i_rFrame.m_Height)
+		arms.m_Joint = -1;
 	const bool bAny = legs.m_Joint >= 0 || arms.m_Joint >= 0;
 	for (std::size_t i = 0; i < i_rSkeleton.size() && bAny; ++i)
 	{
-		votes[i] = VoteOf(regions[i] != ERegion::Nowhere
+		rVotes[i] = VoteOf(regions[i] != ERegion::Nowhere
 		        ? regions[i]
 		        : RegionOfTrunk(i_rSkeleton, std::int64_t(i), legs.m_Joint, arms.m_Joint));
 		// The end of a chain may well be no joint but where the last bone ends.
 		if (mainChildren[i] < 0)
-			votes[i][EOther] = 0.0;
+			rVotes[i][EOther] = 0.0;
 	}
-	return votes;
+	return limbs;
 }
 
 std::vector<VLegs> LegsByShape(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame)

@@ -2,13 +2,26 @@
 
 #include "SetupProposal/BodyParts.h"
 
+#include <optional>
+#include <vector>
+
 namespace SetupProposal
 {
 
-/// What speaks against each part by the limbs of the tree. A pair of twins that hangs on the trunk is a pair of legs if
+/// What the limbs of the tree tell.
+struct VLimbVotes
+{
+	/// What speaks against each part.
+	std::vector<VPartLogs> m_Logs;
+	/// How high legs and arms begin, as parts of the height; nothing if none were found.
+	std::optional<double> m_LegsUp;
+	std::optional<double> m_ArmsUp;
+};
+
+/// A pair of twins that hangs on the trunk is a pair of legs if
 /// it reaches the floor, one of arms if it is long, else neither; the trunk goes from the root to the legs, from there
 /// to the arms and on to the head. Nothing without twins.
-std::vector<VPartLogs> VoteByLimbs(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame);
+VLimbVotes VoteByLimbs(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame);
 
 /// A joint and its twin, from which chains of bones reach the floor.
 struct VLegs

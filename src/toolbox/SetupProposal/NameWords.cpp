@@ -16,6 +16,10 @@ namespace
 constexpr std::size_t c_LongestName = 200;
 /// A word that this many of ten names begin with is a prefix.
 constexpr std::size_t c_PrefixTenths = 8;
+/// The same of one that is glued to words, how long it is at most, and how much behind it is looked at.
+constexpr std::size_t c_GluedTenths = 3;
+constexpr std::size_t c_LongestPrefix = 6;
+constexpr std::size_t c_LongestGlued = 32;
 
 /// Letters with accents, of two bytes in UTF-8 from 0xC3 on, as rigs write them without.
 constexpr std::pair<std::string_view, std::string_view> c_Plain[] = {{"ä", "ae"}, {"ö", "oe"}, {"ü", "ue"}, {"ß", "ss"},
@@ -101,6 +105,17 @@ bool SplitGlued(std::string_view i_Run, bool i_bFirst, std::vector<std::string>&
 	return false;
 }
 
+/// The first run of a name, if it is one that tells nothing.
+std::string UnknownFirstRun(std::string_view i_Bare)
+{
+	const std::vector<std::string> runs = RunsOf(WithoutAccents(i_Bare));
+	std::vector<std::string> glued;
+	if (runs.empty() || KindOf(runs.front().front()) == EKind::Digit || IsKnownWord(runs.front())
+	    || SideOfWord(runs.front()) != ESide::None || SplitGlued(runs.front(), true, glued))
+		return "";
+	return runs.front();
+}
+
 std::string_view Bare(std::string_view i_Name)
 {
 	i_Name.remove_prefix(i_Name.rfind(':') + 1);
@@ -118,13 +133,38 @@ std::string_view Bare(std::string_view i_Name)
 	return i_Name;
 }
 
+/// A prefix that is glued to words, as "chr" in "chrpelvis" and "chrlthigh": the one without which most names are
+/// known; empty if it helps few.
+std::string GluedPrefix(const std::vector<std::string_view>& i_rNames)
+{
+	std::map<std::string, std::size_t> known;
+	for (const std::string_view name : i_rNames)
+	{
+		const std::string run = UnknownFirstRun(Bare(name));
+		for (std::size_t length = 1; length <= c_LongestPrefix && length + 3 <= run.size(); ++length)
+		{
+			const std::string rest = run.substr(length, c_LongestGlued);
+			std::vector<std::string> glued;
+			if (IsKnownWord(rest) || SplitGlued(rest, true, glued))
+				++known[run.substr(0, length)];
+		}
+	}
+	const auto best = std::ranges::max_element(known, {}, [](const auto& i_rCount) { return i_rCount.second; });
+	return best != known.end() && 10 * best->second >= c_GluedTenths * i_rNames.size() && best->second > 4 ? best->first
+	                                                                                                       : "";
+}
+
 /// All words, sides among them.
-std::vector<std::string> AllWords(std::string_view i_Name)
+/// @param i_rPrefix in lower case, which the first may begin with; empty for none.
+std::vector<std::string> AllWords(std::string_view i_Name, const std::string& i_rPrefix = "")
 {
 	std::vector<std::string> words;
-	for (const std::string& rRun : RunsOf(WithoutAccents(Bare(i_Name))))
+	for (std::string& rRun : RunsOf(WithoutAccents(Bare(i_Name))))
 	{
 		std::vector<std::string> glued;
+		if (words.empty() && !i_rPrefix.empty() && rRun.starts_with(i_rPrefix) && rRun.size() > i_rPrefix.size()
+		    && !IsKnownWord(rRun))
+			rRun.erase(0, i_rPrefix.size());
 		const bool bKnown =
 		    KindOf(rRun.front()) == EKind::Digit || IsKnownWord(rRun) || SideOfWord(rRun) != ESide::None;
 		if (!bKnown && SplitGlued(rRun, true, glued))
@@ -174,11 +214,12 @@ VNameWords WordsOf(std::string_view i_Name)
 
 std::vector<VNameWords> WordsOf(const std::vector<std::string_view>& i_rNames)
 {
+	const std::string prefix = GluedPrefix(i_rNames);
 	std::vector<std::vector<std::string>> all;
 	std::map<std::string, std::size_t> first;
 	for (const std::string_view name : i_rNames)
 	{
-		all.push_back(AllWords(name));
+		all.push_back(AllWords(name, prefix));
 		if (!all.back().empty())
 			++first[all.back().front()];
 	}

@@ -6,6 +6,7 @@
 #include <array>
 #include <cmath>
 #include <cstdlib>
+#include <tuple>
 
 namespace SetupProposal
 {
@@ -19,7 +20,7 @@ constexpr double c_ShareOfName = 0.10;
 constexpr double c_OnlyOneCarriesArms = 0.3;
 /// What each joint of a chain that stands above one and not above the other costs.
 constexpr double c_OtherOrdinal = 0.45;
-/// A vote of the rest pose this far below its best speaks against a part.
+/// A vote of the rest pose or the skin this far below its best speaks against a part.
 constexpr double c_ClearlyWorse = 1.5;
 
 double NameLikeness(const VNameWords& i_rA, const VNameWords& i_rB)
@@ -41,11 +42,12 @@ double PlaceLikeness(const VBodyPlace& i_rA, const VBodyPlace& i_rB)
 	return std::exp(-4.0 * away);
 }
 
-double ChainLikeness(const VJointReading& i_rA, const VJointReading& i_rB, EBodyPart i_Part)
+/// @param i_bBothBacks the arms hang on the back in both bodies.
+double ChainLikeness(const VJointReading& i_rA, const VJointReading& i_rB, EBodyPart i_Part, bool i_bBothBacks)
 {
 	if (i_Part == ESpine)
 		return 1.0 - std::abs(i_rA.m_Along - i_rB.m_Along)
-		    - (i_rA.m_bCarriesArms != i_rB.m_bCarriesArms ? c_OnlyOneCarriesArms : 0.0);
+		    - (i_bBothBacks && i_rA.m_bCarriesArms != i_rB.m_bCarriesArms ? c_OnlyOneCarriesArms : 0.0);
 	if (!IsFinger(i_Part) && i_Part != ENeck && i_Part != EToe)
 		return 1.0;
 	return 1.0 - c_OtherOrdinal * std::abs(i_rA.m_Ordinal - i_rB.m_Ordinal);
@@ -71,10 +73,14 @@ EVerdict ByTree(const VJointReading& i_rJoint)
 	return i_rJoint.m_bUsualParent ? EVerdict::For : EVerdict::Against;
 }
 
-EVerdict ByRestPose(const VJointReading& i_rJoint, EBodyPart i_Part)
+EVerdict ByLogs(const VPartLogs& i_rLogs, EBodyPart i_Part)
 {
-	const double best = *std::ranges::max_element(i_rJoint.m_ByRestPose);
-	return i_rJoint.m_ByRestPose[i_Part] > best - c_ClearlyWorse ? EVerdict::For : EVerdict::Against;
+	return i_rLogs[i_Part] > *std::ranges::max_element(i_rLogs) - c_ClearlyWorse ? EVerdict::For : EVerdict::Against;
+}
+
+EVerdict BySkin(const VJointReading& i_rJoint, EBodyPart i_Part)
+{
+	return i_rJoint.m_BySkin ? ByLogs(*i_rJoint.m_BySkin, i_Part) : EVerdict::Silent;
 }
 
 /// What one of the voters says of both joints.
@@ -85,8 +91,10 @@ struct VVoice
 	EVerdict m_Target;
 };
 
+constexpr std::size_t c_Voices = 4;
+
 /// The voices with this verdict on one of the two or both, as "the name of the target, the rest pose".
-std::string Voices(const std::array<VVoice, 3>& i_rVoices, EVerdict i_Verdict)
+std::string Voices(const std::array<VVoice, c_Voices>& i_rVoices, EVerdict i_Verdict)
 {
 	std::string text;
 	for (const VVoice& rVoice : i_rVoices)
@@ -112,7 +120,7 @@ double PairScore(const VBodyReading& i_rSource, std::size_t i_Source, const VBod
 	    + c_ShareOfName * NameLikeness(i_rSource.m_Names[i_Source], i_rTarget.m_Names[i_Target]);
 	return std::max(0.0,
 	    std::sqrt(rSource.m_Likely[i_Part] * rTarget.m_Likely[i_Part]) * likeness
-	        * ChainLikeness(rSource, rTarget, i_Part));
+	        * ChainLikeness(rSource, rTarget, i_Part, i_rSource.m_bBackCarriesArms && i_rTarget.m_bBackCarriesArms));
 }
 
 std::vector<std::string> PairReasons(const VBodyReading& i_rSource, std::size_t i_Source, const VBodyReading& i_rTarget,
@@ -125,14 +133,21 @@ std::vector<std::string> PairReasons(const VBodyReading& i_rSource, std::size_t 
 	const std::string side = !HasSides(i_Part) || rSource.m_Side == ESide::None ? ""
 	    : rSource.m_Side == ESide::Left                                         ? "left "
 	                                                                            : "right ";
-	const std::array<VVoice, 3> voices{{{"the name", ByName(rSource, i_Part), ByName(rTarget, i_Part)},
+	const std::array<VVoice, c_Voices> voices{{{"the name", ByName(rSource, i_Part), ByName(rTarget, i_Part)},
 	    {"the place in the tree", ByTree(rSource), ByTree(rTarget)},
-	    {"the rest pose", ByRestPose(rSource, i_Part), ByRestPose(rTarget, i_Part)}}};
+	    {"the rest pose", ByLogs(rSource.m_ByRestPose, i_Part), ByLogs(rTarget.m_ByRestPose, i_Part)},
+	    {"the skin", BySkin(rSource, i_Part), BySkin(rTarget, i_Part)}}};
 	std::vector<std::string> reasons{side + NameOf(i_Part)};
 	if (const std::string text = Voices(voices, EVerdict::For); !text.empty())
 		reasons.push_back("for it: " + text);
 	if (const std::string text = Voices(voices, EVerdict::Against); !text.empty())
 		reasons.push_back("outvoted: " + text);
+	if (HasSides(i_Part))
+		for (const auto& [pBody, joint, pOf] :
+		    {std::tuple(&i_rSource, i_Source, "source"), std::tuple(&i_rTarget, i_Target, "target")})
+			if (const ESide named = pBody->m_Names[joint].m_Side;
+			    named != ESide::None && named != pBody->m_Joints[joint].m_Side)
+				reasons.push_back("outvoted: the side that the name of the " + std::string(pOf) + " tells");
 	if (const std::string text = Voices(voices, EVerdict::Silent); !text.empty())
 		reasons.push_back("tells nothing: " + text);
 	if (i_Part == ESpine)

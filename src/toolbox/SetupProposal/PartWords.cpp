@@ -36,7 +36,7 @@ constexpr VWordRow c_Rows[] = {
      "lowerchest vertebra vertebrae spn stomach trunk wirbel wirbelsaeule ruecken brust brustkorb bauch rumpf colonne "
      "echine dos "
      "poitrine torse buste ventre columna espalda pecho espina schiena spina petto torace colonna coluna peito costas "
-     "sebone mune 上半身 胸",
+     "sebone senaka mune hara 上半身 胸",
         {ESpine, ESpine}},
     {"neck nape cervical throat hals nacken cou nuque cuello collo pescoco kubi 首", {ENeck, ENeck}},
     {"head skull cranium kopf schaedel tete crane cabeza testa cabeca atama 頭", {EHead, EHead}},
@@ -45,15 +45,16 @@ constexpr VWordRow c_Rows[] = {
     {"upperarm uparm humerus oberarm upperlimb uarm 腕 jowan", {EUpperArm, EUpperArm}},
     {"arm shldr bras brazo braccio braco ude", {EUpperArm, EForeArm}},
     {"forearm lowerarm lowarm radius ulna elbow farm unterarm ellbogen ellenbogen avantbras coude antebrazo codo "
-     "avambraccio gomito antebraco cotovelo hiji ひじ",
+     "avambraccio gomito antebraco cotovelo hiji maeude ひじ",
         {EForeArm, EForeArm}},
     {"hand wrist palm carpus fist handgelenk main poignet mano muneca polso mao pulso tekubi 手首", {EHand, EHand}},
     {"thumb pollex daumen pouce pulgar pollice polegar oyayubi 親指", {EThumb, EThumb}},
-    {"index point pointer forefinger indexfinger zeigefinger indice indicador 人指 人差指",
+    {"index point pointer forefinger indexfinger zeigefinger indice indicador hitosashiyubi hitosashi 人指 人差指",
         {EIndexFinger, EIndexFinger}},
-    {"middle middlefinger mid mittelfinger majeur medio corazon 中指", {EMiddleFinger, EMiddleFinger}},
-    {"ring ringfinger annulaire anular anulare 薬指", {ERingFinger, ERingFinger}},
-    {"pinky pinkie pink little littlefinger kleinfinger kleinerfinger auriculaire menique mignolo minimo mindinho 小指",
+    {"middle middlefinger mid mittelfinger majeur medio corazon nakayubi 中指", {EMiddleFinger, EMiddleFinger}},
+    {"ring ringfinger annulaire anular anulare kusuriyubi 薬指", {ERingFinger, ERingFinger}},
+    {"pinky pinkie pink little littlefinger kleinfinger kleinerfinger auriculaire menique mignolo minimo mindinho "
+     "koyubi 小指",
         {ELittleFinger, ELittleFinger}},
     {"thigh femur upleg upperleg uleg oberschenkel cuisse muslo coscia coxa momo", {EThigh, EThigh}},
     {"leg jambe pierna gamba perna bein ashi 足", {EShin, EThigh}},
@@ -61,8 +62,9 @@ constexpr VWordRow c_Rows[] = {
      "rodilla espinilla pantorrilla ginocchio stinco joelho canela hiza sune ひざ",
         {EShin, EShin}},
     {"hock", {EFoot, EShin}},
-    {"foot feet ankle tarsus fuss knoechel pied cheville pie tobillo piede caviglia pe tornozelo 足首", {EFoot, EFoot}},
-    {"toe toes toebase ball claw metatarsal zehe zehen zeh ballen orteil orteils puntera punta dedos つま先",
+    {"foot feet ankle tarsus fuss knoechel pied cheville pie tobillo piede caviglia pe tornozelo ashikubi 足首",
+        {EFoot, EFoot}},
+    {"toe toes toebase ball claw metatarsal zehe zehen zeh ballen orteil orteils puntera punta dedos tsumasaki つま先",
         {EToe, EToe}},
     {"twist roll nub end tip ik fk ctrl ctl control pole target effector prop weapon sword gun shield tail cape cloak "
      "hair "

@@ -44,8 +44,8 @@ constexpr VExpected c_Expected[] = {
     /* little */ {0.65, 0.18, 0.44, 0.15, 0.02, 0.0, 0.0, 0.0},
     /* thigh */ {0.53, 0.09, 0.06, 0.03, 0.26, -1.0, 0.0, 0.0},
     /* shin */ {0.29, 0.08, 0.08, 0.06, 0.25, -1.0, 0.0, 0.0},
-    /* foot */ {0.06, 0.05, 0.10, 0.07, 0.08, -0.6, 0.0, 0.8},
-    /* toe */ {0.02, 0.03, 0.10, 0.07, 0.0, 0.0, 0.0, 1.0},
+    /* foot */ {0.06, 0.065, 0.10, 0.07, 0.08, -0.6, 0.0, 0.8},
+    /* toe */ {0.02, 0.045, 0.10, 0.07, 0.0, 0.0, 0.0, 1.0},
 };
 
 /// A part that a joint may be needs a child: what it costs not to have one.
@@ -82,7 +82,8 @@ std::vector<VPartLogs> VoteByRestPose(const VRestSkeleton& i_rSkeleton, const VB
 		{
 			const VExpected& rExpected = c_Expected[part];
 			double score =
-			    std::max(c_WorstPlace, Gaussian(place.m_Up, rExpected.m_Up, c_Lenient * rExpected.m_UpDeviation))
+			    std::max(c_WorstPlace,
+			        Gaussian(UsualUp(i_rFrame, place.m_Up), rExpected.m_Up, c_Lenient * rExpected.m_UpDeviation))
 			    + std::max(c_WorstPlace, Gaussian(std::abs(place.m_Left), rExpected.m_Out, rExpected.m_OutDeviation));
 			if (children[i] < 0)
 				score += part == EHead || part == EFoot || rExpected.m_Length < 0.03 ? 0.0 : c_Childless;

@@ -3,11 +3,23 @@
 #include "numerics/Rotation.h"
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <vector>
 
 namespace SetupProposal
 {
+
+/// What a joint moves of the skin, as it stands at rest.
+struct VRestSkin
+{
+	/// Its share of all weights, from 0 to 1.
+	double m_Share = 0.0;
+	/// Mean place of that by weight, in the world, in mm, Z up, and how far from there it is, as the root of the mean
+	/// square.
+	Rotation::VVector3 m_Centre{};
+	double m_Spread = 0.0;
+};
 
 /// A joint where it stands at rest.
 struct VRestJoint
@@ -20,6 +32,8 @@ struct VRestJoint
 	Rotation::VVector3 m_Place{};
 	/// False if it is fixed to its parent: nothing of it is there to follow.
 	bool m_bMoves = true;
+	/// Nothing if no skin is known.
+	std::optional<VRestSkin> m_Skin = std::nullopt;
 };
 
 /// Parents stand before their children; there may be several roots.

@@ -28,6 +28,8 @@ constexpr VUsual c_Usual[] = {
     {EPelvis, EPelvis, -1.5},
     {EPelvis, ESpine, 0.0},
     {EPelvis, EThigh, 0.0},
+    {EPelvis, EClavicle, -2.5},
+    {EPelvis, EUpperArm, -2.5},
     {ESpine, ESpine, 0.0},
     {ESpine, ENeck, 0.0},
     {ESpine, EHead, -2.5},
@@ -84,6 +86,9 @@ std::size_t LastPart(std::size_t i_State)
 	return IsHelper(i_State) ? i_State - c_Parts : i_State;
 }
 
+/// The more hang on one joint beyond what hangs on a body's, the less it tells of them.
+constexpr double c_ChildrenOfBody = 8.0;
+
 using VStates = std::array<double, c_States>;
 
 constexpr double c_Never = -1e300;
@@ -136,6 +141,15 @@ std::vector<VPartScores> LikelyParts(const VRestSkeleton& i_rSkeleton, const std
 {
 	const std::array<VStates, c_States>& rSteps = Steps();
 	const std::size_t count = i_rSkeleton.size();
+	std::vector<double> children(count);
+	for (const VRestJoint& rJoint : i_rSkeleton)
+		if (rJoint.m_Parent >= 0)
+			++children[std::size_t(rJoint.m_Parent)];
+	const auto trust = [&](std::size_t i_Joint)
+	{
+		const std::int64_t parent = i_rSkeleton[i_Joint].m_Parent;
+		return parent < 0 ? 1.0 : std::min(1.0, c_ChildrenOfBody / children[std::size_t(parent)]);
+	};
 	// What a joint and all beneath it say for each of its states, and what of that its parent hears.
 	std::vector<VStates> below(count);
 	std::vector<VStates> told(count);
@@ -148,7 +162,7 @@ std::vector<VPartScores> LikelyParts(const VRestSkeleton& i_rSkeleton, const std
 		{
 			VStates sum;
 			for (std::size_t to = 0; to < c_States; ++to)
-				sum[to] = below[i][to] + rSteps[from][to];
+				sum[to] = below[i][to] + trust(i) * rSteps[from][to];
 			told[i][from] = LogSum(sum);
 		}
 		if (i_rSkeleton[i].m_Parent >= 0)
@@ -176,7 +190,7 @@ std::vector<VPartScores> LikelyParts(const VRestSkeleton& i_rSkeleton, const std
 		{
 			VStates sum;
 			for (std::size_t from = 0; from < c_States; ++from)
-				sum[from] = parent[from] - level + rSteps[from][to];
+				sum[from] = parent[from] - level + trust(i) * rSteps[from][to];
 			above[i][to] = LogSum(sum);
 			all[to] = above[i][to] + below[i][to];
 		}
