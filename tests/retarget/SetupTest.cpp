@@ -124,6 +124,7 @@ TEST_F(Recipe, GivesTheBytesOfTheSameCommands)
 	m_Folder.Write("abc", "abc");
 	EXPECT_EQ(FileDigest::Sha256(m_Folder / "abc", error),
 	    "ba7816bf8f01cfea414140de5dae2223b00361a396177a9cb410ff61f20015ad");
+	EXPECT_EQ(report.at("inputs").at(0).at("sha256"), FileDigest::Sha256OfBytes(m_Folder.Read("recipe.json")));
 }
 
 TEST_F(Recipe, WritesNothingWhereACheckDoesNotHoldOrNothingIsAskedFor)

@@ -38,34 +38,66 @@ VMaking MakingOf(const SetupIO::VSetup& i_rRecipe, const std::string& i_rPath)
 	return making;
 }
 
-/// What went in: the files by their paths in the recipe.
-VJson Digests(const SetupIO::VSetup& i_rRecipe, const VEdits& i_rEdits, const std::string& i_rPath)
+/// What goes in. The digest of a file is made before it is read, and again when all have been: of one that changed in
+/// between nobody knows which bytes were read.
+class VInputs
 {
-	VJson digests = VJson::array();
-	const auto add = [&](const std::string& i_rName, const std::string& i_rFile)
+public:
+	/// @param i_rName as the recipe has it
+	void AddFile(const std::string& i_rName, const std::string& i_rFile)
 	{
-		if (i_rName.empty() || i_rFile == c_pStandardStream)
-			return;
+		if (!i_rName.empty() && i_rFile != c_pStandardStream)
+			m_Inputs.push_back({i_rName, i_rFile, DigestOf(i_rFile)});
+	}
+	/// The bytes themselves.
+	void AddText(const std::string& i_rName, const std::string& i_rText)
+	{
+		if (i_rName != c_pStandardStream)
+			m_Inputs.push_back({i_rName, "", FileDigest::Sha256OfBytes(i_rText)});
+	}
+
+	VJson Told() const
+	{
+		VJson told = VJson::array();
+		for (const VInput& rInput : m_Inputs)
+		{
+			if (!rInput.m_File.empty() && DigestOf(rInput.m_File) != rInput.m_Digest)
+				throw VCommandError(EBadInput,
+				    "\"" + rInput.m_Name + "\" changed while it was read, and nothing is written: build again");
+			NVX_LOG(c_pCategory, NVX::ELogInformation, "Input \"%1%\": SHA-256 %2%", rInput.m_Name, rInput.m_Digest);
+			told.push_back({{"file", rInput.m_Name}, {"sha256", rInput.m_Digest}});
+		}
+		return told;
+	}
+
+private:
+	struct VInput
+	{
+		std::string m_Name;
+		/// Empty for a text.
+		std::string m_File;
+		std::string m_Digest;
+	};
+
+	static std::string DigestOf(const std::string& i_rFile)
+	{
 		std::string error;
 		const auto digest = FileDigest::Sha256(InputPath(i_rFile), error);
 		if (!digest)
 			throw VCommandError(EBadInput, error);
-		NVX_LOG(c_pCategory, NVX::ELogInformation, "Input \"%1%\": SHA-256 %2%", i_rName, *digest);
-		digests.push_back({{"file", i_rName}, {"sha256", *digest}});
-	};
-	add(i_rPath, i_rPath);
-	for (const std::string& rName : {i_rRecipe.m_Fbx, i_rRecipe.m_Subject, i_rRecipe.m_Source})
-		add(rName, PathBeside(i_rPath, rName));
-	for (const VEdit& rEdit : i_rEdits)
-		if (rEdit.m_pKind && rEdit.m_pKind->m_bFile)
-			add(rEdit.m_Value, rEdit.m_Value);
-	return digests;
-}
+		return *digest;
+	}
+
+	std::vector<VInput> m_Inputs;
+};
 
 EExitStatus Build(const VBuildSettings& i_rSettings)
 {
 	const std::string& rPath = i_rSettings.m_Recipe;
-	const SetupIO::VSetup recipe = ParseSetup(ReadSetupText(rPath, "a recipe"), rPath,
+	const std::string text = ReadSetupText(rPath, "a recipe");
+	VInputs inputs;
+	inputs.AddText(rPath, text);
+	const SetupIO::VSetup recipe = ParseSetup(text, rPath,
 	    {"fbx", "subject", "source", "output", "root", "root-height", "pairs", "edits", "checks"}, "a recipe");
 	const VMaking making = MakingOf(recipe, rPath);
 	VOutput out = i_rSettings.m_Out;
@@ -79,8 +111,13 @@ EExitStatus Build(const VBuildSettings& i_rSettings)
 	if (recipe.m_Checks && recipe.m_Checks->m_bNoWarnings)
 		AskStrict();
 	VSession session;
-	session.m_ReportJson["inputs"] = Digests(recipe, edits, rPath);
+	for (const std::string& rName : {recipe.m_Fbx, recipe.m_Subject, recipe.m_Source})
+		inputs.AddFile(rName, PathBeside(rPath, rName));
+	for (const VEdit& rEdit : edits)
+		if (rEdit.m_pKind && rEdit.m_pKind->m_bFile)
+			inputs.AddFile(rEdit.m_Value, rEdit.m_Value);
 	MakeSubject(session, making, edits);
+	session.m_ReportJson["inputs"] = inputs.Told();
 	std::vector<std::string> broken;
 	if (recipe.m_Checks)
 		broken = BrokenChecks(session, *recipe.m_Checks);

@@ -11,6 +11,29 @@
 
 namespace FileDigest
 {
+namespace
+{
+
+std::string Finished(sha256_ctx& io_rContext)
+{
+	std::array<std::uint8_t, SHA256_DIGEST_SIZE> digest{};
+	sha256_digest(&io_rContext, digest.size(), digest.data());
+	constexpr const char* c_Digits = "0123456789abcdef";
+	std::string text;
+	for (const std::uint8_t byte : digest)
+		text += {c_Digits[byte >> 4], c_Digits[byte & 15]};
+	return text;
+}
+
+} // namespace
+
+std::string Sha256OfBytes(std::string_view i_Bytes)
+{
+	sha256_ctx context;
+	sha256_init(&context);
+	sha256_update(&context, i_Bytes.size(), reinterpret_cast<const std::uint8_t*>(i_Bytes.data()));
+	return Finished(context);
+}
 
 std::optional<std::string> Sha256(const boost::filesystem::path& i_rPath, std::string& o_rError)
 {
@@ -30,13 +53,7 @@ std::optional<std::string> Sha256(const boost::filesystem::path& i_rPath, std::s
 		o_rError = "\"" + UtilsFileSystem::ToUtf8(i_rPath) + "\" cannot be read";
 		return std::nullopt;
 	}
-	std::array<std::uint8_t, SHA256_DIGEST_SIZE> digest{};
-	sha256_digest(&context, digest.size(), digest.data());
-	constexpr const char* c_Digits = "0123456789abcdef";
-	std::string text;
-	for (const std::uint8_t byte : digest)
-		text += {c_Digits[byte >> 4], c_Digits[byte & 15]};
-	return text;
+	return Finished(context);
 }
 
 } // namespace FileDigest
