@@ -44,6 +44,12 @@ TEST(Align, BringsEveryCharacterToThePoseOfThePerformer)
 			EXPECT_GT(before, 10.0);
 			EXPECT_TRUE(report.at("aligned").at("refused").empty());
 			EXPECT_EQ(report.at("pose")[4].at("fine"), true) << "told of what comes of all edits";
+			// In the other order the scale is that of the file's pose, which the alignment begins with.
+			const VJson scaledFirst = Create(folder,
+			    {"--root-height", "scale", "--scale", "fit", "--align", "--update-targets"}, "y.qrr", rFbx, rSource);
+			EXPECT_EQ(scaledFirst.at("aligned").at("joints").size(), report.at("aligned").at("joints").size());
+			// Legs that turn bring the hips a little up or down.
+			EXPECT_NEAR(scaledFirst.at("pose")[4].at("numbers").at("scale").get<double>(), 1.0, 0.1);
 			// Of the subject as it was saved.
 			const VJson map = RunJson({"map", "x.qrr", "--source", rSource, "--json", "-q"}, folder);
 			EXPECT_EQ(map.at("pose").size(), 6u);

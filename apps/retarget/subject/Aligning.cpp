@@ -2,6 +2,7 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
+#include "retarget/subject/Mapping.h"
 #include "retarget/text/PoseFindings.h"
 #include "retarget/text/Table.h"
 
@@ -10,6 +11,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <span>
 #include <string_view>
 #include <unistd.h>
 
@@ -21,16 +23,24 @@ namespace
 using CoreOrlexTypes::VSubjectParametrised;
 using SetupProposal::VAlignment;
 
+/// Of a bind pose, what turns: a scale moves what is free along, and turns nothing.
+constexpr std::size_t c_Turn = 3;
+
 /// Whether each joint that there still is stands as it did when the subject was made.
 bool StandsAsMade(const VSession& i_rSession, const VRetargetSetupCore& i_rDocument)
 {
 	const auto pAtRest = i_rDocument.TargetAtRest().m_pParametrised;
+	const auto turn = [](const VSubjectParametrised::VSegment& i_rSegment)
+	{
+		const std::vector<double>& rPose = i_rSegment.m_Joint.m_BindPose;
+		return std::span(rPose).first(std::min(rPose.size(), c_Turn));
+	};
 	return pAtRest
 	    && std::ranges::equal(i_rSession.Target().m_Segments, pAtRest->m_Segments,
-	        [](const VSubjectParametrised::VSegment& i_rNow, const VSubjectParametrised::VSegment& i_rThen)
+	        [&](const VSubjectParametrised::VSegment& i_rNow, const VSubjectParametrised::VSegment& i_rThen)
 	        {
 		        return i_rNow.m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy
-		            || i_rNow.m_Joint.m_BindPose == i_rThen.m_Joint.m_BindPose;
+		            || std::ranges::equal(turn(i_rNow), turn(i_rThen));
 	        });
 }
 
@@ -135,9 +145,8 @@ void AlignTarget(VSession& io_rSession)
 std::vector<SetupProposal::VPoseFinding> PoseFindingsOf(VSession& io_rSession)
 {
 	const auto source = io_rSession.Document().SourceValues();
-	const auto target = io_rSession.Document().TargetValues();
 	const auto sourceRest = RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject);
-	const auto targetRest = RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject);
+	const auto targetRest = io_rSession.Document().TargetSkeleton();
 	return SetupProposal::CheckPose(sourceRest, targetRest, SetupProposal::Propose(sourceRest, targetRest));
 }
 
@@ -153,10 +162,24 @@ void ReportPose(VSession& io_rSession)
 double ScaleThatFits(VSession& io_rSession)
 {
 	io_rSession.Source("--scale fit");
-	for (const SetupProposal::VPoseFinding& rFinding : PoseFindingsOf(io_rSession))
+	VRetargetSetupCore& rDocument = io_rSession.Document();
+	std::vector<SetupProposal::VPoseFinding> findings;
+	double scale = 1.0;
+	if (StandsAsMade(io_rSession, rDocument) && rDocument.DifferenceFromFile())
+	{
+		// A bind pose that nobody has made yet tells no heights.
+		const VMapped mapped = ProposeForFile(io_rSession, io_rSession.m_Root);
+		findings = SetupProposal::CheckPose(mapped.m_Source, mapped.m_Target, mapped.m_Proposal);
+	}
+	else
+	{
+		findings = PoseFindingsOf(io_rSession);
+		scale = rDocument.GetTargetScale();
+	}
+	for (const SetupProposal::VPoseFinding& rFinding : findings)
 		for (const auto& [pName, value] : rFinding.m_Numbers)
 			if (std::string_view(pName) == "scale")
-				return value * io_rSession.Document().GetTargetScale();
+				return value * scale;
 	throw VCommandError(
 	    EFindings, "--scale fit: no hips and feet were found in both skeletons; --scale takes a number, too");
 }
