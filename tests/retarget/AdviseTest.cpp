@@ -1,5 +1,8 @@
 #include "Rows.h"
 
+#include <set>
+#include <utility>
+
 namespace
 {
 
@@ -61,6 +64,27 @@ TEST_F(Advise, TargetsThatPullAgainstEachOther)
 	for (const VJson& rConflict : range["conflicts"])
 		bAgainst = bAgainst || (rConflict["target"].get<int>() < 4 && rConflict["against"] == 4);
 	EXPECT_TRUE(bAgainst);
+	// The demo's set-up: what pulls against others, not everything that is missed where limbs go far.
+	const std::string demo = RETARGET_SOURCE "/demo/";
+	const std::string performer = demo + "performer.qrs";
+	const VRun create = m_Folder.Run({"-q", "create", "--fbx", demo + "character.fbx", "--source", performer, "--auto",
+	    "--align", "-o", "x.qrr", "--force"});
+	ASSERT_EQ(create.m_Status, 0) << create.m_Err;
+	const VJson ranged = Advice({"--source", performer})["range"];
+	std::set<std::pair<int, int>> pairs;
+	std::set<int> pulling;
+	for (const VJson& rConflict : ranged["conflicts"])
+	{
+		const int target = rConflict["target"];
+		const int against = rConflict["against"];
+		EXPECT_LT(rConflict["without"].get<double>(), 0.25 * rConflict["atWorst"].get<double>());
+		EXPECT_FALSE(pairs.contains({against, target})) << "told once";
+		pairs.emplace(target, against);
+		pulling.insert(against);
+	}
+	EXPECT_GT(ranged["unopposed"].get<int>(), 0);
+	EXPECT_GT(pulling.size(), 2u);
+	EXPECT_LT(pulling.size(), 10u);
 }
 
 TEST_F(Advise, WrongInput)

@@ -51,13 +51,11 @@ VJson ToJson(const SetupReview::VRangeOfMotion& i_rRange, const VSubjectParametr
 		conflicts.push_back({{"target", rConflict.m_Target}, {"unit", rConflict.m_bRotation ? "degrees" : "mm"},
 		    {"atRest", value(rConflict.m_AtRest)}, {"atWorst", value(rConflict.m_AtWorst)},
 		    {"source", i_rSource.m_Segments[rConflict.m_SourceSegment].m_Name}, {"axis", rConflict.m_Axis},
-		    {"degrees", AsDegrees(rConflict.m_Angle)},
-		    {"against", rConflict.m_Against ? VJson(*rConflict.m_Against) : VJson()},
-		    {"without", rConflict.m_Against ? VJson(value(rConflict.m_Without)) : VJson()},
-		    {"words", rConflict.m_Words}});
+		    {"degrees", AsDegrees(rConflict.m_Angle)}, {"against", rConflict.m_Against},
+		    {"without", value(rConflict.m_Without)}, {"words", rConflict.m_Words}});
 	}
 	return {{"poses", i_rRange.m_Poses}, {"notConverged", i_rRange.m_NotConverged}, {"cutShort", i_rRange.m_bCutShort},
-	    {"conflicts", conflicts}};
+	    {"conflicts", conflicts}, {"unopposed", i_rRange.m_Unopposed}};
 }
 
 std::string PruneText(const VAdvice& i_rAdvice, const VSubjectParametrised& i_rSubject)
@@ -78,8 +76,14 @@ std::string PruneText(const VAdvice& i_rAdvice, const VSubjectParametrised& i_rS
 std::string RangeText(const SetupReview::VRangeOfMotion& i_rRange)
 {
 	std::string text = "\n" + RangeSummary(i_rRange) + "\n";
-	for (const VRangeConflict& rConflict : i_rRange.m_Conflicts)
-		text += "  " + FitTerminal(Printable(rConflict.m_Words), 4) + "\n";
+	for (std::size_t i = 0; i < i_rRange.m_Conflicts.size(); ++i)
+	{
+		const VRangeConflict& rConflict = i_rRange.m_Conflicts[i];
+		if (i == 0 || rConflict.m_Against != i_rRange.m_Conflicts[i - 1].m_Against)
+			text += FitTerminal(Printable("Target " + rConflict.m_AgainstName + " pulls against"), 2) + "\n";
+		text += "  " + FitTerminal(Printable("target " + rConflict.m_TargetName + ", which " + rConflict.m_Words), 4)
+		    + "\n";
+	}
 	return text;
 }
 
@@ -108,8 +112,8 @@ VCommand AddAdviseCommand(CLI::App& io_rProgram)
 	CLI::App* const pApp = AddCommand(io_rProgram, "advise",
 	    "Advise on the joints of a retarget subject: which carry no target and could go, what the bind pose would be "
 	    "without each, and with the character's file which must stay since its skin bends there. With the performer's "
-	    "skeleton, each of its joints goes through its range, and targets that are missed there are told with the one "
-	    "that pulls against them. Nothing is written",
+	    "skeleton, each of its joints goes through its range, and targets are told that pull against others there. "
+	    "Nothing is written",
 	    {"advise hero.qrr --fbx hero.fbx", "advise hero.qrr --source performer.qrs",
 	        "advise hero.qrr --json | jq -r '.prune[] | select(.verdict == \"go\") | .segment'"});
 	const auto pSettings = std::make_shared<VAdviseSettings>();

@@ -1,7 +1,7 @@
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Parsing.h"
 #include "retarget/commands/Commands.h"
-#include "retarget/subject/PosedByTake.h"
+#include "retarget/subject/PlayedTake.h"
 #include "retarget/subject/Session.h"
 #include "retarget/subject/SolvePlot.h"
 #include "retarget/subject/SolveText.h"
@@ -10,12 +10,9 @@
 #include "retarget/text/Output.h"
 #include "retarget/text/OutputFile.h"
 
-#include "ComputeSubjectFK/ConstructionException.h"
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
 #include "RetargetSetupCore/GlobalScale.h"
-#include "TakeSolve/Performer.h"
-#include "TakeSolve/PosedSubject.h"
 #include "TakeSolve/SolvedMotion.h"
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
@@ -31,17 +28,10 @@ namespace
 {
 
 using CoreOrlexTypes::VSubject;
-using CoreOrlexTypes::VSubjectParametrised;
 
 struct VSolveSettings
 {
-	std::string m_Subject;
-	std::string m_Take;
-	std::string m_Source;
-	std::shared_ptr<TakeIO::VTakeSettings> m_pTake = std::make_shared<TakeIO::VTakeSettings>();
-	std::optional<std::size_t> m_FirstFrame;
-	std::optional<std::size_t> m_LastFrame;
-	std::shared_ptr<VPairSettings> m_pPairs = std::make_shared<VPairSettings>();
+	VTakeToPlay m_What;
 	std::optional<double> m_MaximumPosition;
 	std::optional<double> m_MaximumRotation;
 	bool m_bCsv = false;
@@ -62,8 +52,8 @@ std::string ParseFrames(const std::string& i_rText, VSolveSettings& io_rSettings
 	};
 	const std::string_view text = i_rText;
 	const std::size_t colon = text.find(':');
-	const bool bFine = !text.empty() && parse(text.substr(0, colon), io_rSettings.m_FirstFrame)
-	    && parse(text.substr(colon == std::string::npos ? 0 : colon + 1), io_rSettings.m_LastFrame);
+	const bool bFine = !text.empty() && parse(text.substr(0, colon), io_rSettings.m_What.m_FirstFrame)
+	    && parse(text.substr(colon == std::string::npos ? 0 : colon + 1), io_rSettings.m_What.m_LastFrame);
 	return bFine ? std::string() : "\"" + i_rText + "\" is not FIRST:LAST, two numbers of frames";
 }
 
@@ -92,31 +82,6 @@ private:
 	int m_Shown = -1;
 };
 
-std::size_t LastFrameOrRefuse(const VSolveSettings& i_rSettings, std::size_t i_Frames)
-{
-	const std::size_t first = i_rSettings.m_FirstFrame.value_or(0);
-	const std::size_t last = i_rSettings.m_LastFrame.value_or(i_Frames - 1);
-	if (first > last || last >= i_Frames)
-		throw VCommandError(EWrongUsage,
-		    "--frames: the take has the frames 0 to " + std::to_string(i_Frames - 1) + ", not " + std::to_string(first)
-		        + " to " + std::to_string(last));
-	return last;
-}
-
-VSubjectParametrised PerformerOf(const VSolveSettings& i_rSettings, VSession& io_rSession, const TakeIO::VTake& i_rTake)
-{
-	if (!i_rSettings.m_Source.empty())
-	{
-		io_rSession.LoadSource(i_rSettings.m_Source);
-		return io_rSession.Source("posing it");
-	}
-	std::vector<TakeSolve::VFinding> findings;
-	auto record = TakeSolve::MakePerformer(i_rTake, StemOf(i_rSettings.m_Take), findings);
-	for (const TakeSolve::VFinding& rFinding : findings)
-		NVX_LOG(c_pCategory, NVX::ELogWarning, "%1%", rFinding.m_Message);
-	return std::move(record.m_SubjectParametrised);
-}
-
 /// The targets that are off by more than they may.
 std::string BeyondLimits(const VSolveSettings& i_rSettings, const VSolveResult& i_rResult)
 {
@@ -136,15 +101,15 @@ std::string BeyondLimits(const VSolveSettings& i_rSettings, const VSolveResult& 
 /// Before anything is read: what is written, and that it is no input.
 void CheckOutputs(VSolveSettings& io_rSettings)
 {
-	std::vector<std::string> inputs{
-	    io_rSettings.m_Subject, io_rSettings.m_Take, io_rSettings.m_Source, io_rSettings.m_pPairs->m_File};
+	std::vector<std::string> inputs{io_rSettings.m_What.m_Subject, io_rSettings.m_What.m_Take,
+	    io_rSettings.m_What.m_Source, io_rSettings.m_What.m_pPairs->m_File};
 	if (!io_rSettings.m_Plot.m_Path.empty())
 		CheckOutput(io_rSettings.m_Plot, c_DrawingFile, inputs);
 	VMotionOutput& rMotion = io_rSettings.m_Motion;
 	if (rMotion.m_Path.empty())
 		return;
 	rMotion.m_bForce = io_rSettings.m_Plot.m_bForce;
-	rMotion.m_Name = StemOf(io_rSettings.m_Take);
+	rMotion.m_Name = StemOf(io_rSettings.m_What.m_Take);
 	inputs.push_back(rMotion.m_Character);
 	CheckMotionOutput(rMotion, inputs);
 }
@@ -167,7 +132,7 @@ EExitStatus Solve(VSolveSettings i_Settings)
 	if (!i_Settings.m_Skins.empty())
 	{
 		// Only the subject knows the name.
-		session.LoadTarget(i_Settings.m_Subject);
+		session.LoadTarget(i_Settings.m_What.m_Subject);
 		i_Settings.m_Motion.m_Character = CharacterIn(i_Settings.m_Skins, session);
 	}
 	CheckOutputs(i_Settings);
@@ -176,60 +141,21 @@ EExitStatus Solve(VSolveSettings i_Settings)
 		throw VCommandError(EWrongUsage, "--csv and --json both print the result: give one of them");
 
 	if (i_rSettings.m_Skins.empty())
-		session.LoadTarget(i_rSettings.m_Subject);
-	const auto pairs = ReadPairs(*i_rSettings.m_pPairs);
-	const auto pTake = std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rSettings.m_Take, *i_rSettings.m_pTake));
-	const TakeSolve::VPosedSubject source(PerformerOf(i_rSettings, session, *pTake));
-	const TakeSolve::VPosedSubject target(session.Target());
-	RequireNoErrors();
-
-	std::string error;
-	const auto pMotion = TakeSolve::VSourceMotion::Make(source.m_Subject, source.m_BindPose, pTake, pairs, error);
-	if (!pMotion)
-		throw VCommandError(EWrongUsage, error);
-	const std::size_t last = LastFrameOrRefuse(i_rSettings, pTake->m_Frames);
-	if (target.m_Subject.m_Targets.empty())
-		throw VCommandError(EBadInput, "\"" + i_rSettings.m_Subject + "\" has no targets: there is nothing to solve");
-
-	std::optional<TakeSolve::VTakeSolve> solve;
-	try
-	{
-		solve.emplace(target.m_Subject, target.m_BindPose, pMotion);
-	}
-	catch (const ComputeSubject::VConstructionException&)
-	{
-		throw VCommandError(
-		    EBadInput, "\"" + i_rSettings.m_Subject + "\" has a joint without kinematics; retarget check tells which");
-	}
-	bool bAny = false;
-	for (std::size_t i = 0; i < solve->NumberOfTargets(); ++i)
-		bAny = bAny || solve->IsSolved(i);
-	if (!bAny)
-		throw VCommandError(
-		    EBadInput, "No target can be solved with this performer. " + solve->Findings().front().m_Message);
-	TakeSolve::VSolvedTake solved;
+		session.LoadTarget(i_rSettings.m_What.m_Subject);
+	std::unique_ptr<const VPlayedTake> pPlayed;
 	{
 		VProgressBar bar;
-		TakeSolve::SolveFrames(
-		    *solve, i_rSettings.m_FirstFrame.value_or(0), last,
-		    [&bar](std::size_t i_Solved, std::size_t i_Frames)
-		    {
-			    bar.Show(i_Solved, i_Frames);
-			    return true;
-		    },
-		    solved);
+		pPlayed = PlayTake(session, i_rSettings.m_What,
+		    [&bar](std::size_t i_Solved, std::size_t i_Frames) { bar.Show(i_Solved, i_Frames); });
 	}
-	const TakeSolve::VSolveReport report = TakeSolve::ReportOn(target.m_Subject, target.m_BindPose, *pMotion, solved);
-	VSolveResult result{target.m_Subject, {}, *solve, solved, report};
-	const auto& rNamed = session.Document().TargetValues().m_pApplicationData->m_Targets;
-	for (std::size_t i = 0; i < target.m_Subject.m_Targets.size(); ++i)
-		result.m_TargetNames.push_back(i < rNamed.size() ? rNamed[i].m_Name : std::string());
+	const VSolveResult result = pPlayed->Result();
 
 	if (!i_Settings.m_Motion.m_Path.empty())
 	{
 		i_Settings.m_Motion.m_Scale = RetargetSetup::GetGlobalScale(session.Target());
-		WriteMotionFile(
-		    TakeSolve::MotionOf(target.m_Subject, target.m_BindPose, solved, pTake->m_Rate), i_Settings.m_Motion);
+		WriteMotionFile(TakeSolve::MotionOf(pPlayed->m_Target.m_Subject, pPlayed->m_Target.m_BindPose,
+		                    pPlayed->m_Solved, pPlayed->m_pTake->m_Rate),
+		    i_Settings.m_Motion);
 	}
 	if (!i_rSettings.m_Plot.m_Path.empty())
 	{
@@ -264,18 +190,19 @@ VCommand AddSolveCommand(CLI::App& io_rProgram)
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --max-position 50 --max-rotation 20 -q",
 	        "solve hero.qrr --take walk.bvh --source performer.qrs --json | jq '.targets[] | {name, p95}'"});
 	const auto pSettings = std::make_shared<VSolveSettings>();
-	pApp->add_option("FILE.qrr", pSettings->m_Subject, "The retarget subject, or a legacy one (.qrx)")->required();
-	pApp->add_option("--take", pSettings->m_Take, "The performer's motion: BVH or FBX file")
+	pApp->add_option("FILE.qrr", pSettings->m_What.m_Subject, "The retarget subject, or a legacy one (.qrx)")
+	    ->required();
+	pApp->add_option("--take", pSettings->m_What.m_Take, "The performer's motion: BVH or FBX file")
 	    ->option_text("TAKE")
 	    ->required();
-	pApp->add_option("--source", pSettings->m_Source,
+	pApp->add_option("--source", pSettings->m_What.m_Source,
 	        "The performer's skeleton; without it one is made of the take, as \"retarget performer\" does")
 	    ->option_text("FILE.qrs")
 	    ->check(NotEmpty());
 	AddParsedOption(*pApp, "--frames", "FIRST:LAST", "Only these frames; the take's first is 0",
 	    [pSettings](const std::string& i_rText) { return ParseFrames(i_rText, *pSettings); });
-	AddPairOptions(*pApp, pSettings->m_pPairs);
-	AddTakeOptions(*pApp, pSettings->m_pTake);
+	AddPairOptions(*pApp, pSettings->m_What.m_pPairs);
+	AddTakeOptions(*pApp, pSettings->m_What.m_pTake);
 	AddParsedOption(*pApp, "--max-position", "MM",
 	    "Exit status 1, with their names, if a target is off by more in any frame",
 	    [pSettings](const std::string& i_rText)

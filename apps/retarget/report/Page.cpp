@@ -19,12 +19,15 @@ h2 { font-size: 1.2em; margin: 1.6em 0 0.4em; border-bottom: 1px solid #888; bre
 table { border-collapse: collapse; width: 100%; }
 th, td { border-bottom: 1px solid #ccc; padding: 0.15em 0.8em 0.15em 0; text-align: left; vertical-align: top;
 	overflow-wrap: anywhere; }
-th { border-bottom: 1px solid #000; }
-td.n, th.n { text-align: right; white-space: nowrap; font-variant-numeric: tabular-nums; }
+td { min-width: 6.5em; }
+th { border-bottom: 1px solid #000; overflow-wrap: normal; }
+td.n, th.n { min-width: 0; text-align: right; white-space: nowrap; font-variant-numeric: tabular-nums; }
 tr { break-inside: avoid; }
 thead { display: table-header-group; }
 .pictures { display: flex; flex-wrap: wrap; gap: 1em; }
 figure { margin: 0; width: calc(50% - 0.5em); break-inside: avoid; }
+figure.wide { width: 100%; }
+svg { width: 100%; height: auto; display: block; }
 img { width: 100%; border: 1px solid #ccc; }
 @media print { body { margin: 0; max-width: none; font-size: 9pt; } }
 )";
@@ -120,6 +123,12 @@ void VPage::Pictures(const std::vector<std::string>& i_rCaptions, const std::vec
 		    + "\"><figcaption>" + caption + "</figcaption></figure>\n";
 	}
 	m_Text += "</div>\n";
+}
+
+void VPage::Drawing(const std::string& i_rCaption, const std::string& i_rSvg)
+{
+	m_Text +=
+	    "<figure class=\"wide\">" + i_rSvg + "<figcaption>" + EscapedForHtml(i_rCaption) + "</figcaption></figure>\n";
 }
 
 std::string VPage::Text() const

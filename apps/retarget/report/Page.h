@@ -27,6 +27,10 @@ public:
 	/// @param i_rPngs the bytes of each
 	void Pictures(const std::vector<std::string>& i_rCaptions, const std::vector<std::string>& i_rPngs);
 
+	/// A drawing as wide as the page, and what it shows.
+	/// @param i_rSvg an element "svg" of ours, which escapes what it is given itself
+	void Drawing(const std::string& i_rCaption, const std::string& i_rSvg);
+
 	/// The whole page.
 	std::string Text() const;
 

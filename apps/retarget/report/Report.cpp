@@ -4,7 +4,9 @@
 #include "retarget/report/Page.h"
 #include "retarget/subject/Advice.h"
 #include "retarget/subject/Findings.h"
+#include "retarget/subject/PlayedTake.h"
 #include "retarget/subject/Session.h"
+#include "retarget/subject/SolvePlot.h"
 #include "retarget/subject/TargetLines.h"
 #include "retarget/text/InputFile.h"
 #include "retarget/text/Table.h"
@@ -55,7 +57,7 @@ void AddFiles(const VReportSettings& i_rSettings, VPage& io_rPage)
 {
 	VRows rows;
 	for (const auto& [pWhat, pPath] : {std::pair{"Retarget subject", &i_rSettings.m_In},
-	         {"Performer", &i_rSettings.m_Source}, {"Character", &i_rSettings.m_Fbx}})
+	         {"Performer", &i_rSettings.m_Source}, {"Character", &i_rSettings.m_Fbx}, {"Take", &i_rSettings.m_Take}})
 		if (!pPath->empty())
 			rows.push_back({pWhat, NameOfFile(*pPath), DigestOf(*pPath)});
 	io_rPage.Heading("Files");
@@ -241,11 +243,46 @@ void AddAdvice(VSession& io_rSession, const VReportSettings& i_rSettings, VPage&
 	if (!advice.m_Range)
 		return io_rPage.Paragraph("The performer's skeleton was not given.");
 	io_rPage.Paragraph(RangeSummary(*advice.m_Range) + ".");
-	std::vector<std::string> conflicts;
+	VRows conflicts;
 	for (const SetupReview::VRangeConflict& rConflict : advice.m_Range->m_Conflicts)
-		conflicts.push_back(rConflict.m_Words);
+		conflicts.push_back({rConflict.m_AgainstName, rConflict.m_TargetName, rConflict.m_Words});
 	if (!conflicts.empty())
-		io_rPage.List(conflicts);
+		io_rPage.Table({"Pulls", "Against", "Which"}, conflicts);
+}
+
+/// What the targets are off by while a take plays, and what an animator would look for.
+void AddTake(VSession& io_rSession, const VReportSettings& i_rSettings, VPage& io_rPage)
+{
+	if (i_rSettings.m_Take.empty())
+		return;
+	VTakeToPlay what;
+	what.m_Subject = i_rSettings.m_In;
+	what.m_Take = i_rSettings.m_Take;
+	what.m_Source = i_rSettings.m_Source;
+	const auto pPlayed = PlayTake(io_rSession, what);
+	const VSolveResult result = pPlayed->Result();
+	io_rPage.Heading("With the take " + NameOfFile(i_rSettings.m_Take));
+	io_rPage.Drawing("What the targets are off by, over the frames; the worst of each kind are named. Solved by a "
+	                 "stand-in for the host's solve.",
+	    SolvePlot(result));
+	VRows rows;
+	for (std::size_t i = 0; i < result.m_rReport.m_Targets.size(); ++i)
+	{
+		const VSubject::VTarget& rTarget = result.m_rTarget.m_Targets[i];
+		const TakeSolve::VTargetQuality& rQuality = result.m_rReport.m_Targets[i];
+		const double factor = UnitFactor(rTarget);
+		if (rQuality.m_Frames > 0)
+			rows.push_back(
+			    {std::to_string(i), SourceOf(result.m_rTarget, rTarget) + " to " + TargetOf(result.m_rTarget, rTarget),
+			        Fixed(factor * rQuality.m_Rms, 1), Fixed(factor * rQuality.m_P95, 1),
+			        Fixed(factor * rQuality.m_Max, 1), UnitOf(rTarget), std::to_string(rQuality.m_MaxFrame)});
+	}
+	io_rPage.Table({"#No.", "Target", "#Rms", "#95 %", "#Most", "Unit", "#In frame"}, rows);
+	std::vector<std::string> findings;
+	for (const TakeSolve::VFinding& rFinding : CommandLine::FindingsOf(result))
+		findings.push_back(rFinding.m_Message);
+	if (!findings.empty())
+		io_rPage.List(findings);
 }
 
 void AddFindings(VSession& io_rSession, VPage& io_rPage, VReport& io_rReport)
@@ -280,6 +317,7 @@ VReport MakeReport(const VReportSettings& i_rSettings, const VRender& i_rRender)
 	AddCoverage(session, page);
 	AddUnmapped(session, page);
 	AddAdvice(session, i_rSettings, page);
+	AddTake(session, i_rSettings, page);
 	AddFindings(session, page, report);
 	report.m_Text = page.Text();
 	return report;

@@ -15,6 +15,7 @@ struct VReportSettings
 	/// Empty for none.
 	std::string m_Source;
 	std::string m_Fbx;
+	std::string m_Take;
 	bool m_bPictures = true;
 };
 

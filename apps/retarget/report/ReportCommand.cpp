@@ -25,7 +25,8 @@ struct VReportCommandSettings : VReportSettings
 EExitStatus Report(VReportCommandSettings& io_rSettings, const VRender& i_rRender)
 {
 	const std::string& rPath = io_rSettings.m_Out.m_Path;
-	CheckOutput(io_rSettings.m_Out, c_PageFile, {io_rSettings.m_In, io_rSettings.m_Source, io_rSettings.m_Fbx});
+	CheckOutput(io_rSettings.m_Out, c_PageFile,
+	    {io_rSettings.m_In, io_rSettings.m_Source, io_rSettings.m_Fbx, io_rSettings.m_Take});
 	io_rSettings.m_bPictures = !io_rSettings.m_bNoPictures;
 	const VReport report = MakeReport(io_rSettings, i_rRender);
 	if (!report.m_NoPictures.empty() && io_rSettings.m_bPictures)
@@ -54,6 +55,7 @@ VCommand AddReportCommand(CLI::App& io_rProgram, const VRender& i_rRender)
 	    "nothing follows, joints that could go, range of motion, findings, and the files with their hashes. Without a "
 	    "display with OpenGL it has no pictures, which it says",
 	    {"report hero.qrr -o hero.html", "report hero.qrr --source performer.qrs --fbx hero.fbx -o hero.html",
+	        "report hero.qrr --source performer.qrs --take walk.bvh -o hero.html",
 	        "report hero.qrr --no-pictures -o - | lp"});
 	const auto pSettings = std::make_shared<VReportCommandSettings>();
 	pApp->add_option("FILE.qrr", pSettings->m_In, "The retarget subject, or a legacy one (.qrx); - is standard input")
@@ -63,6 +65,10 @@ VCommand AddReportCommand(CLI::App& io_rProgram, const VRender& i_rRender)
 	    ->check(NotEmpty());
 	pApp->add_option("--fbx", pSettings->m_Fbx, "The character's FBX file, for its skin")
 	    ->option_text("FILE")
+	    ->check(NotEmpty());
+	pApp->add_option("--take", pSettings->m_Take,
+	        "A BVH or FBX file that the performer plays: plots of what the targets are off by over its frames")
+	    ->option_text("TAKE")
 	    ->check(NotEmpty());
 	pApp->add_flag("--no-pictures", pSettings->m_bNoPictures,
 	    "Draw none, so that the same files give the same bytes "

@@ -7,6 +7,7 @@
 #include "FBXIO/FBXReader.h"
 
 #include <numbers>
+#include <set>
 
 namespace CommandLine
 {
@@ -47,12 +48,19 @@ std::string RangeSummary(const SetupReview::VRangeOfMotion& i_rRange)
 {
 	if (!i_rRange.m_Refusal.empty())
 		return "No range of motion: " + i_rRange.m_Refusal;
+	std::set<std::size_t> against;
+	for (const SetupReview::VRangeConflict& rConflict : i_rRange.m_Conflicts)
+		against.insert(rConflict.m_Against);
+	const std::size_t pullers = against.size();
 	return "Range of motion: " + std::to_string(i_rRange.m_Poses) + " poses, in "
 	    + (i_rRange.m_NotConverged == 0
 	            ? "all of which the solve came to its end"
 	            : std::to_string(i_rRange.m_NotConverged) + " of which the solve found only the best it could")
-	    + "; " + std::to_string(i_rRange.m_Conflicts.size())
-	    + " targets are missed by 10 mm or 5 degrees more than at rest"
+	    + "; " + std::to_string(pullers) + (pullers == 1 ? " target pulls" : " targets pull") + " against "
+	    + std::to_string(i_rRange.m_Conflicts.size()) + " others: a lower weight, or lengths that are more alike, helps"
+	    + (i_rRange.m_Unopposed == 0 ? ""
+	                                 : "; " + std::to_string(i_rRange.m_Unopposed)
+	                + " more are missed by 10 mm or 5 degrees more than at rest, with no single one against them")
 	    + (i_rRange.m_bCutShort ? "; there is more than was looked at" : "");
 }
 

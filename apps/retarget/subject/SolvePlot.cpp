@@ -1,5 +1,6 @@
 #include "retarget/subject/SolvePlot.h"
 
+#include "retarget/report/Page.h"
 #include "retarget/text/Table.h"
 
 #include <algorithm>
@@ -24,18 +25,10 @@ constexpr std::size_t c_Points = 1800;
 constexpr std::array<const char*, 7> c_Colours{
     "#0072b2", "#d55e00", "#009e73", "#cc79a7", "#e69f00", "#56b4e9", "#000000"};
 
-std::string XmlText(const std::string& i_rText)
-{
-	std::string text;
-	for (const char byte : Printable(i_rText))
-		text += byte == '<' ? "&lt;" : byte == '>' ? "&gt;" : byte == '&' ? "&amp;" : std::string(1, byte);
-	return text;
-}
-
 std::string Text(double i_X, double i_Y, const char* i_pAnchor, const std::string& i_rText, const char* i_pColour)
 {
 	return "<text x=\"" + Fixed(i_X, 1) + "\" y=\"" + Fixed(i_Y, 1) + "\" text-anchor=\"" + i_pAnchor + "\" fill=\""
-	    + i_pColour + "\">" + XmlText(i_rText) + "</text>\n";
+	    + i_pColour + "\">" + EscapedForHtml(i_rText) + "</text>\n";
 }
 
 std::string Line(double i_X1, double i_Y1, double i_X2, double i_Y2)
@@ -118,9 +111,9 @@ std::string SolvePlot(const VSolveResult& i_rResult)
 {
 	const std::string width = Fixed(c_Left + c_Width + c_Names, 0);
 	const std::string height = Fixed(2.0 * (c_Top + c_Height) + c_Gap, 0);
-	return "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"" + width + "\" height=\"" + height
-	    + "\" font-family=\"sans-serif\" font-size=\"12\">\n<rect width=\"" + width + "\" height=\"" + height
-	    + "\" fill=\"#ffffff\"/>\n" + Panel(i_rResult, false, c_Top)
+	return "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"" + width + "\" height=\"" + height + "\" viewBox=\"0 0 "
+	    + width + " " + height + "\" font-family=\"sans-serif\" font-size=\"12\">\n<rect width=\"" + width
+	    + "\" height=\"" + height + "\" fill=\"#ffffff\"/>\n" + Panel(i_rResult, false, c_Top)
 	    + Panel(i_rResult, true, 2.0 * c_Top + c_Height + 0.5 * c_Gap) + "</svg>\n";
 }
 

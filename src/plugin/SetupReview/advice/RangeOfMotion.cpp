@@ -37,7 +37,7 @@ constexpr int c_Steps = 4;
 constexpr double c_MissedDistance = 10.0;
 constexpr double c_MissedAngle = 5.0 * c_Degree;
 /// A target without which at most this share of the miss is left pulls against it.
-constexpr double c_LeftShare = 0.5;
+constexpr double c_LeftShare = 0.25;
 /// Poses, and solves in which a target is left out; a body takes some hundred of each, and a damaged file may hold more
 /// than anybody waits for.
 constexpr std::size_t c_MostPoses = 5000;
@@ -269,21 +269,50 @@ private:
 				m_Result.m_bCutShort = true;
 				return;
 			}
-			VRangeConflict& rConflict = m_Result.m_Conflicts.emplace_back();
-			rConflict = {i, atRest, rWorst.m_Residual, bRotation, rWorst.m_Pose.m_Segment, rWorst.m_Pose.m_Axis,
-			    rWorst.m_Pose.m_Angle, {}, rWorst.m_Residual * c_LeftShare, {}};
+			VRangeConflict conflict{i, atRest, rWorst.m_Residual, bRotation, rWorst.m_Pose.m_Segment,
+			    rWorst.m_Pose.m_Axis, rWorst.m_Pose.m_Angle, i, rWorst.m_Residual * c_LeftShare, {}, {}, {}};
 			for (std::size_t other = 0; other < m_Worst.size(); ++other)
 				if (other != i && m_Worst[other].m_Residual >= 0.0 && OfOneLimb(i, other))
 				{
 					++trials;
-					if (const double without = ResidualWithout(i, other, rWorst); without < rConflict.m_Without)
+					if (const double without = ResidualWithout(i, other, rWorst); without < conflict.m_Without)
 					{
-						rConflict.m_Without = without;
-						rConflict.m_Against = other;
+						conflict.m_Without = without;
+						conflict.m_Against = other;
 					}
 				}
+			if (conflict.m_Against == i)
+				++m_Result.m_Unopposed;
+			else
+				m_Result.m_Conflicts.push_back(std::move(conflict));
+		}
+		KeepOneOfTwo();
+		std::ranges::stable_sort(m_Result.m_Conflicts, {}, &VRangeConflict::m_Against);
+		for (VRangeConflict& rConflict : m_Result.m_Conflicts)
+		{
+			rConflict.m_TargetName = NameOfTarget(rConflict.m_Target);
+			rConflict.m_AgainstName = NameOfTarget(rConflict.m_Against);
 			rConflict.m_Words = WordsFor(rConflict);
 		}
+	}
+
+	/// Of two that pull against each other.
+	void KeepOneOfTwo()
+	{
+		std::vector<VRangeConflict>& rConflicts = m_Result.m_Conflicts;
+		std::vector<std::size_t> pulls(m_Worst.size());
+		for (const VRangeConflict& rConflict : rConflicts)
+			++pulls[rConflict.m_Against];
+		const auto goes = [&, before = rConflicts](const VRangeConflict& i_rConflict)
+		{
+			const bool bMutual = std::ranges::any_of(before,
+			    [&](const VRangeConflict& i_rOther)
+			    { return i_rOther.m_Target == i_rConflict.m_Against && i_rOther.m_Against == i_rConflict.m_Target; });
+			const std::size_t puller = pulls[i_rConflict.m_Against];
+			const std::size_t pulled = pulls[i_rConflict.m_Target];
+			return bMutual && (puller != pulled ? puller < pulled : i_rConflict.m_Against > i_rConflict.m_Target);
+		};
+		std::erase_if(rConflicts, goes);
 	}
 
 	std::string NameOfTarget(std::size_t i_Target) const
@@ -295,14 +324,10 @@ private:
 	std::string WordsFor(const VRangeConflict& i_rConflict) const
 	{
 		const bool bRotation = i_rConflict.m_bRotation;
-		return "target " + NameOfTarget(i_rConflict.m_Target) + " is missed by "
-		    + ValueWords(i_rConflict.m_AtWorst, bRotation) + " where the performer's \""
+		return "is missed by " + ValueWords(i_rConflict.m_AtWorst, bRotation) + " where the performer's \""
 		    + m_rSource.m_Segments[i_rConflict.m_SourceSegment].m_Name + "\" turns by "
-		    + ValueWords(std::abs(i_rConflict.m_Angle), true) + " about its " + "XYZ"[i_rConflict.m_Axis] + " axis: "
-		    + (i_rConflict.m_Against ? "target " + NameOfTarget(*i_rConflict.m_Against)
-		                + " pulls against it, without which it is missed by "
-		                + ValueWords(i_rConflict.m_Without, bRotation)
-		                             : "no single target pulls against it; lengths differ, or joints are missing");
+		    + ValueWords(std::abs(i_rConflict.m_Angle), true) + " about its " + "XYZ"[i_rConflict.m_Axis]
+		    + " axis, and without that by " + ValueWords(i_rConflict.m_Without, bRotation);
 	}
 
 	const VSubjectParametrised& m_rSource;

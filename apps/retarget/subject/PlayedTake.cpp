@@ -1,0 +1,102 @@
+#include "retarget/subject/PlayedTake.h"
+
+#include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/Messages.h"
+#include "retarget/subject/TakeFile.h"
+
+#include "ComputeSubjectFK/ConstructionException.h"
+#include "DebugServices/GlobalLog.h"
+#include "TakeSolve/Performer.h"
+
+#include <utility>
+
+namespace CommandLine
+{
+namespace
+{
+
+using CoreOrlexTypes::VSubjectParametrised;
+
+VSubjectParametrised PerformerOf(const VTakeToPlay& i_rWhat, VSession& io_rSession, const TakeIO::VTake& i_rTake)
+{
+	if (!i_rWhat.m_Source.empty())
+	{
+		io_rSession.LoadSource(i_rWhat.m_Source);
+		return io_rSession.Source("posing it");
+	}
+	std::vector<TakeSolve::VFinding> findings;
+	auto record = TakeSolve::MakePerformer(i_rTake, StemOf(i_rWhat.m_Take), findings);
+	for (const TakeSolve::VFinding& rFinding : findings)
+		NVX_LOG(c_pCategory, NVX::ELogWarning, "%1%", rFinding.m_Message);
+	return std::move(record.m_SubjectParametrised);
+}
+
+std::pair<std::size_t, std::size_t> FramesOrRefuse(const VTakeToPlay& i_rWhat, std::size_t i_Frames)
+{
+	const std::size_t first = i_rWhat.m_FirstFrame.value_or(0);
+	const std::size_t last = i_rWhat.m_LastFrame.value_or(i_Frames - 1);
+	if (first > last || last >= i_Frames)
+		throw VCommandError(EWrongUsage,
+		    "--frames: the take has the frames 0 to " + std::to_string(i_Frames - 1) + ", not " + std::to_string(first)
+		        + " to " + std::to_string(last));
+	return {first, last};
+}
+
+} // namespace
+
+VPlayedTake::VPlayedTake(const VSubjectParametrised& i_rSource, const VSubjectParametrised& i_rTarget,
+    std::shared_ptr<const TakeIO::VTake> i_pTake)
+    : m_pTake(std::move(i_pTake)), m_Source(i_rSource), m_Target(i_rTarget)
+{
+}
+
+std::unique_ptr<const VPlayedTake> PlayTake(
+    VSession& io_rSession, const VTakeToPlay& i_rWhat, const std::function<void(std::size_t, std::size_t)>& i_rProgress)
+{
+	const TakeSolve::VSourceSettings pairs = ReadPairs(*i_rWhat.m_pPairs);
+	const auto pTake = std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rWhat.m_Take, *i_rWhat.m_pTake));
+	const VSubjectParametrised performer = PerformerOf(i_rWhat, io_rSession, *pTake);
+	auto pPlayed = std::make_unique<VPlayedTake>(performer, io_rSession.Target(), pTake);
+	RequireNoErrors();
+	const TakeSolve::VPosedSubject& rSource = pPlayed->m_Source;
+	const TakeSolve::VPosedSubject& rTarget = pPlayed->m_Target;
+	std::string error;
+	const auto pMotion = TakeSolve::VSourceMotion::Make(rSource.m_Subject, rSource.m_BindPose, pTake, pairs, error);
+	if (!pMotion)
+		throw VCommandError(EWrongUsage, error);
+	const auto [first, last] = FramesOrRefuse(i_rWhat, pTake->m_Frames);
+	if (rTarget.m_Subject.m_Targets.empty())
+		throw VCommandError(EBadInput, "\"" + i_rWhat.m_Subject + "\" has no targets: there is nothing to solve");
+	try
+	{
+		pPlayed->m_Solve.emplace(rTarget.m_Subject, rTarget.m_BindPose, pMotion);
+	}
+	catch (const ComputeSubject::VConstructionException&)
+	{
+		throw VCommandError(
+		    EBadInput, "\"" + i_rWhat.m_Subject + "\" has a joint without kinematics; retarget check tells which");
+	}
+	const TakeSolve::VTakeSolve& rSolve = *pPlayed->m_Solve;
+	bool bAny = false;
+	for (std::size_t i = 0; i < rSolve.NumberOfTargets(); ++i)
+		bAny = bAny || rSolve.IsSolved(i);
+	if (!bAny)
+		throw VCommandError(
+		    EBadInput, "No target can be solved with this performer. " + rSolve.Findings().front().m_Message);
+	TakeSolve::SolveFrames(
+	    *pPlayed->m_Solve, first, last,
+	    [&](std::size_t i_Solved, std::size_t i_Frames)
+	    {
+		    if (i_rProgress)
+			    i_rProgress(i_Solved, i_Frames);
+		    return true;
+	    },
+	    pPlayed->m_Solved);
+	pPlayed->m_Report = TakeSolve::ReportOn(rTarget.m_Subject, rTarget.m_BindPose, *pMotion, pPlayed->m_Solved);
+	const auto& rNamed = io_rSession.Document().TargetValues().m_pApplicationData->m_Targets;
+	for (std::size_t i = 0; i < rTarget.m_Subject.m_Targets.size(); ++i)
+		pPlayed->m_TargetNames.push_back(i < rNamed.size() ? rNamed[i].m_Name : std::string());
+	return pPlayed;
+}
+
+} // namespace CommandLine
