@@ -52,6 +52,23 @@ TEST(Report, TellsTheSetUp)
 	}
 }
 
+TEST(Report, PlotsATake)
+{
+	const VScratchFolder folder;
+	const std::string demo = RETARGET_SOURCE "/demo/";
+	const VRun create = folder.Run({"-q", "create", "--fbx", demo + "character.fbx", "--source", demo + "performer.qrs",
+	    "--position", "Pelvis:haunch", "-o", "x.qrr"});
+	ASSERT_EQ(create.m_Status, 0) << create.m_Err;
+	folder.Write("x.qrr", boost::replace_all_copy(folder.Read("x.qrr"), "haunch", "&lt;script&gt;"));
+	const VRun report = folder.Run({"-q", "report", "x.qrr", "--source", demo + "performer.qrs", "--take",
+	    demo + "walk.bvh", "--no-pictures", "-o", "-"});
+	ASSERT_EQ(report.m_Status, 0) << report.m_Err;
+	EXPECT_EQ(report.m_Out.find("<script"), std::string::npos);
+	for (const char* const pShown : {"With the take walk.bvh", "<figure class=\"wide\"><svg ", "<polyline ",
+	         "#0 Pelvis to &lt;script&gt;</text>", "<bdi>Pelvis to &lt;script&gt;</bdi>"})
+		EXPECT_NE(report.m_Out.find(pShown), std::string::npos) << pShown;
+}
+
 TEST(Report, WrongInput)
 {
 	const VScratchFolder folder;
@@ -66,6 +83,8 @@ TEST(Report, WrongInput)
 	        {"no page", {"report", "x.qrr", "-o", "x.pdf"}, 2, "",
 	            "an HTML page; let the name of its file end in .html"},
 	        {"another page", {"report", "x.qrr", "-o", "other.html"}, 4, "", "is there, and is not an HTML page"},
+	        {"no take", {"-q", "report", "x.qrr", "--take", "none.bvh", "--no-pictures", "-o", "x.html"}, 3, "",
+	            "none.bvh"},
 	        {"no folder", {"-q", "report", "x.qrr", "--no-pictures", "-o", "none/x.html"}, 4, "", "none"},
 	    },
 	    folder);

@@ -19,7 +19,7 @@ h2 { font-size: 1.2em; margin: 1.6em 0 0.4em; border-bottom: 1px solid #888; bre
 table { border-collapse: collapse; width: 100%; }
 th, td { border-bottom: 1px solid #ccc; padding: 0.15em 0.8em 0.15em 0; text-align: left; vertical-align: top;
 	overflow-wrap: anywhere; }
-td { min-width: 6.5em; }
+td { min-width: 8.5em; }
 th { border-bottom: 1px solid #000; overflow-wrap: normal; }
 td.n, th.n { min-width: 0; text-align: right; white-space: nowrap; font-variant-numeric: tabular-nums; }
 tr { break-inside: avoid; }
