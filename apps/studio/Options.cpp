@@ -4,6 +4,7 @@
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Parsing.h"
 #include "studio/panel/FileKind.h"
+#include "studio/window/StudioWindow.h"
 
 #include <charconv>
 
@@ -53,7 +54,7 @@ QSize ParseSize(const std::string& i_rText)
 std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::string& o_rText)
 {
 	const auto pMessages = std::make_shared<CommandLine::VMessageSettings>();
-	std::string module, settings, fbx, source, target, take, screenshot, size;
+	std::string module, settings, fbx, source, target, take, dialog, screenshot, size;
 	std::size_t frame = 0;
 	std::vector<std::string> files;
 	bool bDeveloper = false;
@@ -73,6 +74,9 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	app.add_option("--frame", frame, "Show this frame of the take first; its first is 0")
 	    ->option_text("NUMBER")
 	    ->needs(pTake);
+	app.add_option("--open", dialog, "Open a dialog, too: the proposed targets, the alignment, or the preferences")
+	    ->option_text("align|preferences|propose")
+	    ->check(CLI::IsMember(VStudioWindow::Dialogs()));
 	app.add_option("--screenshot", screenshot, "Save a picture of the window when it is ready, and end")
 	    ->option_text("OUT.png");
 	app.add_option("--size", size, "Size of the window in pixels; 1280x800 for pictures")->option_text("WxH");
@@ -105,6 +109,7 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	options.m_bDeveloper = bDeveloper;
 	options.m_Take = QString::fromStdString(take);
 	options.m_Frame = frame;
+	options.m_Dialog = dialog;
 	if (!size.empty())
 		options.m_Size = ParseSize(size);
 	else if (!screenshot.empty())

@@ -26,6 +26,8 @@ struct VOptions
 	QString m_Take;
 	/// Of the take, to be shown first.
 	std::size_t m_Frame = 0;
+	/// A dialog to open when the files are open; empty for none.
+	std::string m_Dialog;
 	/// Where the picture goes; empty for a window that stays.
 	QString m_Screenshot;
 	QSize m_Size;

@@ -126,6 +126,8 @@ int RunWindow(QApplication& io_rApplication, const VOptions& i_rOptions)
 		window.Open(rFile);
 	if (!i_rOptions.m_Take.isEmpty())
 		window.OpenTake(i_rOptions.m_Take, i_rOptions.m_Frame);
+	if (!i_rOptions.m_Dialog.empty())
+		window.OpenDialogSoon(i_rOptions.m_Dialog);
 	if (!bScreenshot)
 		return QApplication::exec();
 	if (!bLoaded)

@@ -6,13 +6,16 @@
 #include "studio/host/Services.h"
 
 #include <QApplication>
+#include <QClipboard>
 #include <QComboBox>
 #include <QFile>
 #include <QGuiApplication>
+#include <QProcess>
 #include <QQuickItem>
 #include <QStyleHints>
 #include <QTableWidget>
 #include <QTest>
+#include <QTreeWidget>
 #include <QWindow>
 
 namespace
@@ -389,8 +392,9 @@ TEST_F(Job, JudgesProposedTargets)
 		const auto& rTable = *rDialog.findChild<QTableWidget*>("Pairs");
 		auto* const pItem = itemOf(rTable, "L_Humerus");
 		ASSERT_TRUE(pItem);
-		EXPECT_TRUE(rTable.item(pItem->row(), 4)->text().contains("name")) << "a reason";
-		click(rDialog, *rTable.viewport(), rTable.visualItemRect(rTable.item(pItem->row(), 4)).center());
+		EXPECT_TRUE(rTable.item(pItem->row(), 6)->text().contains("name")) << "a reason";
+		const_cast<QTableWidget&>(rTable).scrollToItem(pItem);
+		click(rDialog, *rTable.viewport(), rTable.visualItemRect(rTable.item(pItem->row(), 6)).center());
 		ASSERT_EQ(selection().size(), 2u);
 		EXPECT_EQ(Names("sourceSegments").value(int(selection()[0].m_ElementIndex)), "L_Humerus");
 		EXPECT_EQ(Names("targetSegments").value(int(selection()[1].m_ElementIndex)), "upperArmLeft");
@@ -441,10 +445,31 @@ TEST_F(Job, JudgesProposedTargets)
 			QTest::keyClick(QApplication::activePopupWidget()->windowHandle(), key);
 		const QString last = Names("targetSegments").last();
 		EXPECT_EVENTUALLY(pBox->currentText() == last);
-		EXPECT_EQ(rTable.item(pItem->row(), 4)->text(), "chosen by hand");
+		// The other becomes one of a position with a weight of its own.
+		const int head = itemOf(rTable, "Cranium")->row();
+		const_cast<QTableWidget&>(rTable).scrollToItem(rTable.item(head, 0));
+		auto* const pKind = qobject_cast<QComboBox*>(rTable.cellWidget(head, 3));
+		click(rDialog, *pKind, pKind->rect().center());
+		ASSERT_TRUE(Eventually([] { return QApplication::activePopupWidget() != nullptr; }));
+		for (const Qt::Key key : {Qt::Key_Home, Qt::Key_Return})
+			QTest::keyClick(QApplication::activePopupWidget()->windowHandle(), key);
+		EXPECT_EVENTUALLY(pKind->currentText() == "position");
+		const auto* const pWeight = rTable.cellWidget(head, 4);
+		click(rDialog, *pWeight, {20, pWeight->height() / 2});
+		EXPECT_FALSE(rTable.cellWidget(head, 5)->isEnabled());
+		QTest::keyClick(rDialog.windowHandle(), Qt::Key_A, Qt::ControlModifier);
+		for (const char key : {'2', '.', '5'})
+			QTest::keyClick(rDialog.windowHandle(), key);
+		EXPECT_EQ(rTable.item(pItem->row(), 6)->text(), "chosen by hand");
 		press(rDialog, "ProposeAdd");
 		EXPECT_EQ(rOperator.Property("targetsRow0", "visible").toBool(), true);
-		EXPECT_TRUE(Targets() >= 2 && Targets() <= 4);
+		rOperator.Click("saveAs");
+		rOperator.AnswerDialog(File("two.qrr"));
+		EXPECT_EVENTUALLY(QFile::exists(File("two.qrr")));
+		EXPECT_TRUE(Content("two.qrr")
+		    == CommandLine(
+		        {"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--match-file-pose",
+		            "--position", "Cranium:skull", "--weight", "0=2.5", "--rotation", "L_Humerus:" + last}));
 		rOperator.Key(Qt::Key_Z, Qt::ControlModifier);
 		EXPECT_EQ(Targets(), 0);
 	}
@@ -479,6 +504,25 @@ TEST_F(Job, AlignsToTheSourceWithAPreview)
 	align();
 	press("AlignToSource", "AlignLegs");
 	press("AlignToSource", "AlignLegs");
+	{
+		auto& rDialog = *m_pWindow->findChild<QWidget*>("AlignToSource");
+		auto& rTable = *rDialog.findChild<QTableWidget*>("AlignedJoints");
+		const auto row = [&] { return rTable.findItems("upperArmLeft", Qt::MatchExactly).value(0)->row(); };
+		const auto isMoved = [&] { return rTable.item(row(), 3)->text() != rTable.item(row(), 4)->text(); };
+		EXPECT_TRUE(isMoved());
+		// Locked and not any more.
+		for (const bool bMoved : {false, true})
+		{
+			rTable.scrollToItem(rTable.item(row(), 0));
+			const QRect place = rTable.visualItemRect(rTable.item(row(), 0));
+			QTest::mouseClick(rDialog.windowHandle(), Qt::LeftButton, {},
+			    rTable.viewport()->mapTo(&rDialog, QPoint(place.left() + 10, place.center().y())));
+			EXPECT_EVENTUALLY(isMoved() == bMoved);
+		}
+		const auto selected = m_pWindow->Context().GetSelectionManager()->Selection().Items();
+		ASSERT_EQ(selected.size(), 2u);
+		EXPECT_EQ(Names("sourceSegments").value(int(selected[0].m_ElementIndex)), "L_Humerus");
+	}
 	press("AlignToSource", "AlignKeep");
 	EXPECT_EVENTUALLY(!m_pWindow->findChild<QWidget*>("AlignToSource"));
 	m_pWindow->activateWindow();
@@ -488,8 +532,90 @@ TEST_F(Job, AlignsToTheSourceWithAPreview)
 	EXPECT_EVENTUALLY(QFile::exists(File("aligned.qrr")));
 	EXPECT_TRUE(Content("aligned.qrr")
 	    == CommandLine({"edit", File("before.qrr"), "--source", File("performer.qrs"), "--align"}));
+	// The steps give the file again.
+	rOperator.AnswerNextDialog(File("steps.json"));
+	rOperator.ChooseInMenu("EditMenu", "SaveRecipe");
+	EXPECT_EVENTUALLY(QFile::exists(File("steps.json")));
+	Run({"build", File("steps.json"), "-o", File("built.qrr")});
+	EXPECT_TRUE(Content("built.qrr") == Content("aligned.qrr")) << Content("steps.json").toStdString();
+	rOperator.ChooseInMenu("EditMenu", "CopyCommands");
+	QString commands = QGuiApplication::clipboard()->text();
+	EXPECT_TRUE(commands.startsWith("retarget create") && commands.contains("--align"));
+	commands.replace(0, 8, RETARGET_PROGRAM " -q");
+	QFile::remove(File("aligned.qrr"));
+	EXPECT_EQ(QProcess::execute("sh", {"-c", commands}), 0) << commands.toStdString();
+	EXPECT_TRUE(Content("built.qrr") == Content("aligned.qrr"));
 	EXPECT_EQ(rOperator.ChooseInMenu("EditMenu", "Undo"), "&Undo Align to Source");
 	EXPECT_EQ(rOperator.ChooseInMenu("EditMenu", "Undo"), "&Undo Propose Targets") << "one step";
+	rOperator.AnswerNextDialog(File("steps.json"));
+	rOperator.AnswerNextQuestion("steps.json is there already. Do you want to replace it?", QMessageBox::Yes);
+	rOperator.ChooseInMenu("EditMenu", "SaveRecipe");
+	EXPECT_EVENTUALLY(!Content("steps.json").contains("position")) << "what was undone is no step";
+}
+
+TEST_F(Job, OffersToReBindToAChangedFileAndToAnotherPerformer)
+{
+	VOperator& rOperator = *m_pOperator;
+	CreateTargetSubject();
+	for (const auto& [pSource, pTarget] : {std::pair("ThoraxHigh", "breast"), {"Cranium", "skull"}})
+	{
+		SelectPair(pSource, pTarget);
+		rOperator.Click("addRotationTarget");
+	}
+	EXPECT_EVENTUALLY(Targets() == 2);
+	rOperator.Click("saveAs");
+	rOperator.AnswerDialog(File("before.qrr"));
+	EXPECT_EVENTUALLY(QFile::exists(File("before.qrr")));
+	const auto write = [this](const char* i_pName, const QByteArray& i_rContent)
+	{
+		QFile file(File(i_pName));
+		return file.open(QIODevice::WriteOnly) && file.write(i_rContent) == i_rContent.size();
+	};
+	const auto shown = [&](const QString& i_rLine)
+	{
+		QWidget* pDialog = nullptr;
+		EXPECT_EVENTUALLY(
+		    (pDialog = m_pWindow->findChild<QWidget*>("Rebind")) && pDialog->windowHandle() && pDialog->isVisible());
+		const auto* const pList = pDialog ? pDialog->findChild<QTreeWidget*>("RebindList") : nullptr;
+		EXPECT_TRUE(pList && !pList->findItems(i_rLine, Qt::MatchContains | Qt::MatchRecursive).isEmpty())
+		    << i_rLine.toStdString();
+		return pDialog;
+	};
+	const auto press = [&](QWidget* i_pDialog, const char* i_pButton)
+	{
+		ASSERT_TRUE(i_pDialog && i_pDialog->windowHandle());
+		EXPECT_EVENTUALLY(i_pDialog->windowHandle()->isExposed());
+		const auto* const pButton = i_pDialog->findChild<QWidget*>(i_pButton);
+		QTest::mouseClick(
+		    i_pDialog->windowHandle(), Qt::LeftButton, {}, pButton->mapTo(i_pDialog, pButton->rect().center()));
+		EXPECT_EVENTUALLY(!m_pWindow->findChild<QWidget*>("Rebind"));
+		m_pWindow->activateWindow();
+		EXPECT_TRUE(QTest::qWaitForWindowActive(m_pWindow.get()));
+	};
+	const auto saveAs = [&](const char* i_pName)
+	{
+		rOperator.Click("saveAs");
+		rOperator.AnswerDialog(File(i_pName));
+		EXPECT_EVENTUALLY(QFile::exists(File(i_pName)));
+	};
+	// A bone gets another name of as many letters.
+	ASSERT_TRUE(write("character.fbx", Content("character.fbx").replace("breast", "thorax")));
+	press(shown("breast is thorax, by its place"), "RebindDo");
+	EXPECT_TRUE(Names("targetSegments").contains("thorax"));
+	saveAs("rebound.qrr");
+	EXPECT_TRUE(Content("rebound.qrr") == CommandLine({"rebind", File("before.qrr"), "--fbx", File("character.fbx")}));
+	EXPECT_EQ(rOperator.ChooseInMenu("EditMenu", "Undo"), "&Undo Re-bind");
+	EXPECT_TRUE(Names("targetSegments").contains("breast")) << "one step";
+	rOperator.Key(Qt::Key_Y, Qt::ControlModifier);
+
+	ASSERT_TRUE(write("second.qrs", Content("performer.qrs").replace("\"Cranium\"", "\"Kopf\"")));
+	EXPECT_EVENTUALLY(rOperator.Property("SourceSkeleton", "count").toInt() > 1);
+	rOperator.Choose("SourceSkeleton", "second");
+	press(shown("Cranium is Kopf"), "RebindLeave");
+	rOperator.ChooseInMenu("ToolsMenu", "RebindToPerformer");
+	press(shown("Cranium is Kopf"), "RebindDo");
+	saveAs("second.qrr");
+	EXPECT_TRUE(Content("second.qrr") == CommandLine({"rebind", File("rebound.qrr"), "--source", File("second.qrs")}));
 }
 
 TEST_F(Job, ALegacyFileIsSavedUnderANewName)

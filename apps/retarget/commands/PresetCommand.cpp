@@ -18,13 +18,9 @@ EExitStatus SavePreset(const std::string& i_rSubject, const VOutput& i_rOut)
 {
 	CheckOutput(i_rOut, c_SetupFile, {i_rSubject});
 	const VSubjectFile file = ReadSubjectFile(i_rSubject);
-	SetupIO::VSetup preset;
 	std::vector<std::string> leftOut;
-	preset.m_Pairs = RetargetSetup::PairsOf(file.m_Record.m_SubjectParametrised, leftOut);
-	const auto& rData = file.m_Record.m_SubjectApplicationData;
-	preset.m_Comment = "Pairs of "
-	    + (rData.m_RetargetSourceTemplate.empty() ? "a performer" : rData.m_RetargetSourceTemplate) + " and "
-	    + (rData.m_Skin.empty() ? "a character" : rData.m_Skin);
+	const SetupIO::VSetup preset =
+	    RetargetSetup::PresetOf(file.m_Record.m_SubjectParametrised, file.m_Record.m_SubjectApplicationData, leftOut);
 	for (const std::string& rSentence : leftOut)
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "%1%", rSentence);
 	if (preset.m_Pairs.empty())

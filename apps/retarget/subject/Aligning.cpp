@@ -11,9 +11,11 @@
 
 #include <algorithm>
 #include <cmath>
-#include <span>
+#include <iterator>
+#include <sstream>
 #include <string_view>
 #include <unistd.h>
+#include <utility>
 
 namespace CommandLine
 {
@@ -22,27 +24,6 @@ namespace
 
 using CoreOrlexTypes::VSubjectParametrised;
 using SetupProposal::VAlignment;
-
-/// Of a bind pose, what turns: a scale moves what is free along, and turns nothing.
-constexpr std::size_t c_Turn = 3;
-
-/// Whether each joint that there still is stands as it did when the subject was made.
-bool StandsAsMade(const VSession& i_rSession, const VRetargetSetupCore& i_rDocument)
-{
-	const auto pAtRest = i_rDocument.TargetAtRest().m_pParametrised;
-	const auto turn = [](const VSubjectParametrised::VSegment& i_rSegment)
-	{
-		const std::vector<double>& rPose = i_rSegment.m_Joint.m_BindPose;
-		return std::span(rPose).first(std::min(rPose.size(), c_Turn));
-	};
-	return pAtRest
-	    && std::ranges::equal(i_rSession.Target().m_Segments, pAtRest->m_Segments,
-	        [&](const VSubjectParametrised::VSegment& i_rNow, const VSubjectParametrised::VSegment& i_rThen)
-	        {
-		        return i_rNow.m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy
-		            || std::ranges::equal(turn(i_rNow), turn(i_rThen));
-	        });
-}
 
 /// To so many decimals, and never a zero with a sign.
 double Rounded(double i_Value, int i_Decimals)
@@ -93,16 +74,25 @@ std::string ToText(
 
 } // namespace
 
-void ChooseChain(VSession& io_rSession, const std::string& i_rChain)
+void ChooseChain(VSession& io_rSession, const std::string& i_rChains)
 {
 	RetargetSetup::VAlignmentChoice& rChoice = io_rSession.m_Alignment;
-	const bool bAll = i_rChain == "all";
-	if (!bAll && i_rChain != "arms" && i_rChain != "legs" && i_rChain != "spine")
-		throw VCommandError(EWrongUsage, "--chain: a chain is arms, legs, spine or all, not \"" + i_rChain + "\"");
-	rChoice.m_bArms = bAll || i_rChain == "arms";
-	rChoice.m_bLegs = bAll || i_rChain == "legs";
-	rChoice.m_bSpine = bAll || i_rChain == "spine";
-	rChoice.m_bOthers = bAll;
+	const std::pair<const char*, bool*> chains[] = {{"spine", &rChoice.m_bSpine}, {"arms", &rChoice.m_bArms},
+	    {"legs", &rChoice.m_bLegs}, {"others", &rChoice.m_bOthers}};
+	for (const auto& [pName, pWanted] : chains)
+		*pWanted = i_rChains == "all";
+	if (i_rChains == "all")
+		return;
+	std::istringstream words(i_rChains + ",");
+	for (std::string word; std::getline(words, word, ',');)
+	{
+		const auto found =
+		    std::ranges::find(chains, word, [](const auto& i_rChain) { return std::string(i_rChain.first); });
+		if (found == std::end(chains))
+			throw VCommandError(
+			    EWrongUsage, "--chain: a chain is arms, legs, spine, others or all, not \"" + word + "\"");
+		*found->second = true;
+	}
 }
 
 void ChooseFeet(VSession& io_rSession, const std::string& i_rFeet)
@@ -118,27 +108,31 @@ void LockSegment(VSession& io_rSession, const std::string& i_rSegment)
 	    FindElement(i_rSegment, SegmentsOf(io_rSession.Target(), "target segment")));
 }
 
+void UnlockSegment(VSession& io_rSession, const std::string& i_rSegment)
+{
+	io_rSession.m_Alignment.m_Locked.erase(FindElement(i_rSegment, SegmentsOf(io_rSession.Target(), "target segment")));
+}
+
+void AlignAsItStands(VSession& io_rSession, const std::string&)
+{
+	io_rSession.m_Alignment.m_bAsItStands = true;
+}
+
 void AlignTarget(VSession& io_rSession)
 {
 	const VSubjectParametrised& rSource = io_rSession.Source("--align");
 	VRetargetSetupCore& rDocument = io_rSession.Document();
-	if (StandsAsMade(io_rSession, rDocument) && rDocument.DifferenceFromFile())
-	{
-		NVX_LOG(c_pCategory, NVX::ELogInformation, "--align begins with the pose of the FBX file");
-		io_rSession.MatchFilePose();
-	}
-	const auto source = rDocument.SourceValues();
-	const auto target = rDocument.TargetValues();
-	std::string reason;
-	const auto aligned = RetargetSetup::AlignToSource(*source.m_pParametrised, *source.m_pSubject,
-	    *target.m_pParametrised, *target.m_pSubject, io_rSession.m_Alignment, reason);
+	const bool bFromFile = !io_rSession.m_Alignment.m_bAsItStands && rDocument.AlignsFromFilePose();
+	const auto aligned = rDocument.AlignToSource(io_rSession.m_Alignment);
 	if (!aligned)
-		throw VCommandError(EBadInput, "--align: " + reason);
-	rDocument.SetTargetSubjectParametrised(aligned->m_Subject);
-	for (const auto& rChain : aligned->m_Alignment.m_Refused)
+		throw VCommandError(EBadInput, "--align: " + io_rSession.WhyIgnored());
+	if (bFromFile)
+		io_rSession.TookFilePose();
+	const VSubjectParametrised& rTarget = io_rSession.Target();
+	for (const auto& rChain : aligned->m_Refused)
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "--align: the %1% stays as it is: %2%", rChain.m_Chain, rChain.m_Reason);
-	io_rSession.m_ReportJson["aligned"] = ToJson(aligned->m_Alignment, rSource, aligned->m_Subject);
-	io_rSession.m_ReportText += ToText(aligned->m_Alignment, rSource, aligned->m_Subject);
+	io_rSession.m_ReportJson["aligned"] = ToJson(*aligned, rSource, rTarget);
+	io_rSession.m_ReportText += ToText(*aligned, rSource, rTarget);
 	io_rSession.m_bAligned = true;
 }
 
@@ -165,7 +159,7 @@ double ScaleThatFits(VSession& io_rSession)
 	VRetargetSetupCore& rDocument = io_rSession.Document();
 	std::vector<SetupProposal::VPoseFinding> findings;
 	double scale = 1.0;
-	if (StandsAsMade(io_rSession, rDocument) && rDocument.DifferenceFromFile())
+	if (rDocument.AlignsFromFilePose())
 	{
 		// A bind pose that nobody has made yet tells no heights.
 		const VMapped mapped = ProposeForFile(io_rSession, io_rSession.m_Root);

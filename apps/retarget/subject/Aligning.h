@@ -11,7 +11,7 @@
 namespace CommandLine
 {
 
-/// "--chain": from here on only what is told, "arms", "legs", "spine" or "all".
+/// "--chain": from here on only what is told, "all" or some of "arms", "legs", "spine", "others".
 void ChooseChain(VSession& io_rSession, const std::string& i_rChain);
 
 /// "--feet": from here on feet keep their tilt, "level", or lean as the shins do, "shins".
@@ -19,6 +19,12 @@ void ChooseFeet(VSession& io_rSession, const std::string& i_rFeet);
 
 /// "--lock": a segment of the target subject that keeps its joint as it is.
 void LockSegment(VSession& io_rSession, const std::string& i_rSegment);
+
+/// "--unlock": it no longer does.
+void UnlockSegment(VSession& io_rSession, const std::string& i_rSegment);
+
+/// "--as-it-stands": no pose of the FBX file comes before.
+void AlignAsItStands(VSession& io_rSession, const std::string&);
 
 /// "--align": with the angles before and after in what the session reports. Chains that would stand worse stay, which
 /// is a warning. A subject that stands as it was made takes the pose of its FBX file first.

@@ -183,6 +183,33 @@ void SetState(VSession& io_rSession, const std::string& i_rValue)
 	io_rSession.Document().SetTargetSubjectParametrised(subject);
 }
 
+/// What stands between commas, as it stands.
+std::vector<std::string> SplitAtCommas(const std::string& i_rText)
+{
+	std::vector<std::string> parts{""};
+	for (const char byte : i_rText)
+		if (byte == ',')
+			parts.emplace_back();
+		else
+			parts.back() += byte;
+	return parts;
+}
+
+void SetExpressions(VSession& io_rSession, const std::string& i_rValue)
+{
+	const std::size_t at = i_rValue.find('=');
+	const std::vector<std::string> texts = SplitAtCommas(at == std::string::npos ? "" : i_rValue.substr(at + 1));
+	if (texts.size() != 3)
+		throw VCommandError(EWrongUsage, "--expressions: \"" + i_rValue + "\" is not TARGET=X,Y,Z");
+	VSubjectParametrised subject = io_rSession.Target();
+	const std::size_t index = ParseIndex(i_rValue.substr(0, at), "target", subject.m_Targets.size());
+	for (std::size_t i = 0; i < 3; ++i)
+		if (!texts[i].empty() && !RetargetSetup::SetStateExpression(subject, texts[i], index, i))
+			throw VCommandError(
+			    EWrongUsage, "--expressions: target #" + std::to_string(index) + " cannot take \"" + texts[i] + "\"");
+	io_rSession.Document().SetTargetSubjectParametrised(subject);
+}
+
 void SetScale(VSession& io_rSession, const std::string& i_rValue)
 {
 	const double scale = i_rValue == "fit" ? ScaleThatFits(io_rSession) : ParseFinite(i_rValue, "--scale");
@@ -260,6 +287,29 @@ void MatchFilePose(VSession& io_rSession, const std::string&)
 	io_rSession.MatchFilePose();
 }
 
+void FbxPose(VSession& io_rSession, const std::string& i_rPath)
+{
+	io_rSession.LoadFbx(i_rPath);
+	io_rSession.MatchFilePose();
+}
+
+void SwitchSource(VSession& io_rSession, const std::string& i_rPath)
+{
+	io_rSession.LoadSource(i_rPath);
+}
+
+void NameSource(VSession& io_rSession, const std::string& i_rName)
+{
+	io_rSession.NameSource(i_rName);
+}
+
+void SwitchRootHeight(VSession& io_rSession, const std::string& i_rWord)
+{
+	if (i_rWord != "keep" && i_rWord != c_pScaleRootHeight)
+		throw VCommandError(EWrongUsage, "--switch-root-height: keep or scale, not \"" + i_rWord + "\"");
+	io_rSession.Document().SetScaleRootHeight(i_rWord == c_pScaleRootHeight);
+}
+
 void Align(VSession& io_rSession, const std::string&)
 {
 	AlignTarget(io_rSession);
@@ -307,10 +357,17 @@ constexpr VEditKind c_Kinds[] = {
     {"--state", "N=X,Y,Z",
         "Give target N the offset X,Y,Z: mm at the present scale (position) or an angle-axis in radians (rotation)",
         SetState},
+    {"--expressions", "N=X,Y,Z",
+        "Give target N the offset X,Y,Z as the fields of the panel take it: an angle may be an expression, and what is "
+        "left empty stays",
+        SetExpressions},
     {"--scale", "S",
         "Scale all lengths of the target subject: 1 is the size in the file, fit brings the hips to the height of the "
         "source's",
         SetScale},
+    {"--switch-root-height", "keep|scale",
+        "From here on, and at once, what the scale does to the height of the root above the floor, as --root-height",
+        SwitchRootHeight},
     {"--create-joints", nullptr, "Give every segment without a joint a ball joint", CreateJoints},
     {"--prune-joints", nullptr, "Remove the joints of segments that carry no target", PruneJoints},
     {"--pose", "SEG=RX,RY,RZ[,TX,TY,TZ]",
@@ -326,17 +383,26 @@ constexpr VEditKind c_Kinds[] = {
         "offsets again. A subject that stands as it was made takes the pose of the FBX file first",
         Align},
     {"--lock", "SEGMENT", "From here on, --align leaves the joint of the target segment SEGMENT as it is", LockSegment},
-    {"--chain", "arms|legs|spine|all",
-        "From here on, --align reaches only the arms, the legs, or the spine with neck, pelvis and facing (at first "
-        "all)",
+    {"--unlock", "SEGMENT", "From here on, --align turns the joint of the target segment SEGMENT again", UnlockSegment},
+    {"--chain", "arms|legs|spine|others|all",
+        "From here on, --align reaches only the arms, the legs, the spine with neck, pelvis and facing, or what is no "
+        "part of a body; several are separated by commas (at first all)",
         ChooseChain},
     {"--feet", "level|shins",
         "From here on, --align lets the feet keep their tilt (level, at first), or lean as the shins do (shins): for a "
         "performer whose legs are splayed in its bind pose, and whose soles are with them",
         ChooseFeet},
+    {"--as-it-stands", nullptr, "From here on, --align begins with no other pose than the one that stands there",
+        AlignAsItStands},
     {"--match-file-pose", nullptr,
         "Set all bind poses so that the segments stand as the bones do in the FBX file; belongs after --prune-joints",
         MatchFilePose, true},
+    {"--fbx-pose", "FILE",
+        "As --match-file-pose, by the character's FBX file FILE, which a saved retarget subject has none of", FbxPose,
+        false, true},
+    {"--switch-source", "FILE.qrs", "From here on, the source is FILE.qrs", SwitchSource, false, true},
+    {"--source-name", "NAME",
+        "Save NAME as the source that the subject is made for, in place of the one that it was made with", NameSource},
     {"--update-targets", nullptr, "Measure the offset of every target again in the present bind poses", UpdateTargets},
 };
 

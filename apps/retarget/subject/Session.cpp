@@ -41,6 +41,27 @@ void ForgetPoseWarnings()
 	    });
 }
 
+/// Keeps why a command was ignored.
+class VTellingDocument final : public VRetargetSetupCore
+{
+public:
+	VTellingDocument(std::string& o_rWhyIgnored, const std::shared_ptr<InMemoryHost::VDispatcher>& i_rpDispatcher)
+	    : VRetargetSetupCore(i_rpDispatcher,
+	        NVX::CountedPointer<TesselPluginInterface::IFrameFactory>(new InMemoryHost::VFrameFactory),
+	        NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)),
+	      m_rWhyIgnored(o_rWhyIgnored)
+	{
+	}
+
+private:
+	void CommandIgnored(const char* /*i_pCommand*/, const std::string& i_rReason) override
+	{
+		m_rWhyIgnored = i_rReason;
+	}
+
+	std::string& m_rWhyIgnored;
+};
+
 } // namespace
 
 std::size_t FindRootBone(const std::string& i_rWord, const FBXIO::VSkinSkeleton& i_rSkeleton)
@@ -63,9 +84,7 @@ std::size_t FindRootBone(const std::string& i_rWord, const FBXIO::VSkinSkeleton&
 VSession::VSession()
     : m_pApplication(std::make_shared<InMemoryHost::VApplication>()),
       m_pDispatcher(std::make_shared<InMemoryHost::VDispatcher>()),
-      m_pDocument(std::make_shared<VRetargetSetupCore>(m_pDispatcher,
-          NVX::CountedPointer<TesselPluginInterface::IFrameFactory>(new InMemoryHost::VFrameFactory),
-          NVX::CountedPointer<TesselPluginInterface::IItemFactory>(new InMemoryHost::VItemFactory)))
+      m_pDocument(std::make_shared<VTellingDocument>(m_WhyIgnored, m_pDispatcher))
 {
 	m_pApplication->m_Rules.m_bOwnFormsAreDetails = true;
 	m_pDocument->SetHostRules(m_pApplication);
@@ -143,7 +162,15 @@ void VSession::Report(const std::string& i_rPath) const
 
 void VSession::MatchFilePose()
 {
+	m_WhyIgnored.clear();
 	m_pDocument->MatchFilePose();
+	if (!m_WhyIgnored.empty())
+		throw VCommandError(EBadInput, "The pose of the FBX file cannot be taken. " + m_WhyIgnored);
+	TookFilePose();
+}
+
+void VSession::TookFilePose()
+{
 	m_bMatched = true;
 	ForgetPoseWarnings();
 }
@@ -158,6 +185,14 @@ void VSession::ForgetNamelessFiles()
 		data.m_RetargetSourceTemplate.clear();
 	if (data != *values.m_pApplicationData)
 		m_pDocument->SetTargetSubject(*values.m_pParametrised, data, m_pDocument->GetTargetExtras());
+}
+
+void VSession::NameSource(const std::string& i_rName)
+{
+	const auto values = m_pDocument->TargetValues();
+	CoreOrlexTypes::VSubjectApplicationData data = *values.m_pApplicationData;
+	data.m_RetargetSourceTemplate = i_rName;
+	m_pDocument->SetTargetSubject(*values.m_pParametrised, data, m_pDocument->GetTargetExtras());
 }
 
 void VSession::Save(const std::string& i_rPath)

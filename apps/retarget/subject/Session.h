@@ -62,8 +62,16 @@ public:
 	/// Segments of the target subject that have a joint.
 	std::size_t CountJoints() const;
 
-	/// Gives all bind poses of the file, and forgets what was told of the pose before.
+	/// Why the command that did nothing last did nothing, a sentence.
+	const std::string& WhyIgnored() const { return m_WhyIgnored; }
+
+	/// Gives all bind poses of the file.
 	void MatchFilePose();
+	/// What was told of the pose before is forgotten.
+	void TookFilePose();
+
+	/// Saved as the source that the subject is made for.
+	void NameSource(const std::string& i_rName);
 
 	/// Whether targets that are added get a mirrored partner; off at first, as in the panel.
 	bool m_bSymmetry = false;
@@ -90,6 +98,7 @@ public:
 private:
 	std::shared_ptr<InMemoryHost::VApplication> m_pApplication;
 	std::shared_ptr<InMemoryHost::VDispatcher> m_pDispatcher;
+	std::string m_WhyIgnored;
 	std::shared_ptr<VRetargetSetupCore> m_pDocument;
 	/// False where it came from standard input.
 	bool m_bSourceNamed = true;

@@ -268,6 +268,7 @@ constexpr VValue c_Values[] = {
     {"N", TargetIndex},
     {"N=W", TargetAndValue},
     {"N=X,Y,Z", TargetAndValue},
+    {"NAME", Nothing},
     {"NAME=EXPR", Nothing},
     {"NAME=NUMBER", Nothing},
     {"NAME|INDEX", RootBone},

@@ -14,6 +14,8 @@ namespace StudioHost
 
 /// Where takes are looked for: a folder of the preferences beside those that modules know.
 inline constexpr const char* c_pTakesFolderKey = "FolderTakes";
+/// The same of presets.
+inline constexpr const char* c_pPresetsFolderKey = "FolderPresets";
 
 /// The user's preferences as entries of the store, under their plain keys.
 class VPreferences : public TesselPluginInterface::IPreferenceFolders

@@ -39,7 +39,9 @@ constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubje
     {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"},
     {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"MatchFilePose", "Take pose from FBX"},
     {"UpdateTargets", "Update targets"}, {"ProposeTargets", "Propose Targets"}, {"AddTargets", "Propose Targets"},
-    {"AlignToSource", "Align to Source"}, {"RestoreTargetSubjectURL", "Restore"}};
+    {"AlignToSource", "Align to Source"}, {"CopyCommands", "Copy as Commands"}, {"SaveRecipe", "Save as Recipe"},
+    {"FitPreset", "Preset"}, {"Rebind", "Re-bind"}, {"SavePreset", "Save as Preset"},
+    {"RestoreTargetSubjectURL", "Restore"}};
 
 /// By objectName, of what can be seen.
 QQuickItem* ItemNamed(QQuickItem& i_rItem, const QString& i_rName)
@@ -74,6 +76,7 @@ VRetargetPanel::VRetargetPanel(
 	connect(m_pDocument, SIGNAL(targetSubjectLoaded(QUrl)), this, SLOT(TellUsed(QUrl)));
 	connect(m_pDocument, SIGNAL(targetSubjectSaved(QUrl)), this, SLOT(TellUsed(QUrl)));
 	connect(m_pDocument, SIGNAL(unsavedChangesChanged()), this, SIGNAL(stateChanged()));
+	connect(m_pDocument, SIGNAL(rebindCalledFor(bool)), this, SIGNAL(rebindCalledFor(bool)));
 	for (const char* const pName : {"SourceSegmentModel", "TargetSegmentModel"})
 		if (const QAbstractItemModel* const pModel = Model(pName))
 			connect(pModel, &QAbstractItemModel::modelReset, this, &VRetargetPanel::segmentsChanged);
@@ -318,6 +321,17 @@ void VRetargetPanel::EndStep()
 	QMetaObject::invokeMethod(m_pDocument, "EndStep");
 }
 
+QString VRetargetPanel::SessionCommands()
+{
+	ApplyTyped();
+	return AskDocument("SessionCommands");
+}
+
+bool VRetargetPanel::SaveRecipe(const QString& i_rPath)
+{
+	return SaveBy("SaveRecipeURL", i_rPath);
+}
+
 QVariantMap VRetargetPanel::ProposeTargets(double i_LeastScore)
 {
 	ApplyTyped();
@@ -327,18 +341,41 @@ QVariantMap VRetargetPanel::ProposeTargets(double i_LeastScore)
 	return proposal;
 }
 
+QVariantMap VRetargetPanel::FitPreset(const QString& i_rPath, double i_LeastScore)
+{
+	ApplyTyped();
+	QVariantMap fit;
+	QMetaObject::invokeMethod(m_pDocument, "FitPreset", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, fit),
+	    Q_ARG(QUrl, QUrl::fromLocalFile(i_rPath)), Q_ARG(double, i_LeastScore));
+	return fit;
+}
+
+bool VRetargetPanel::SavePreset(const QString& i_rPath)
+{
+	return SaveBy("SavePresetURL", i_rPath);
+}
+
+bool VRetargetPanel::SaveBy(const char* i_pCommand, const QString& i_rPath)
+{
+	ApplyTyped();
+	bool bSaved = false;
+	QMetaObject::invokeMethod(m_pDocument, i_pCommand, Qt::DirectConnection, Q_RETURN_ARG(bool, bSaved),
+	    Q_ARG(QUrl, QUrl::fromLocalFile(i_rPath)));
+	return bSaved;
+}
+
 void VRetargetPanel::AddTargets(const QVariantList& i_rTargets)
 {
 	ApplyTyped();
 	QMetaObject::invokeMethod(m_pDocument, "AddTargets", Q_ARG(QVariantList, i_rTargets));
 }
 
-QVariantMap VRetargetPanel::AlignToSource(const QVariantList& i_rChains)
+QVariantMap VRetargetPanel::AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked)
 {
 	ApplyTyped();
 	QVariantMap aligned;
 	QMetaObject::invokeMethod(m_pDocument, "AlignToSource", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, aligned),
-	    Q_ARG(QVariantList, i_rChains));
+	    Q_ARG(QVariantList, i_rChains), Q_ARG(QVariantList, i_rLocked));
 	return aligned;
 }
 
@@ -352,6 +389,20 @@ bool VRetargetPanel::IsAligning() const
 void VRetargetPanel::EndAlignment(bool i_bKeep)
 {
 	QMetaObject::invokeMethod(m_pDocument, "EndAlignment", Q_ARG(bool, i_bKeep));
+}
+
+QVariantMap VRetargetPanel::LookAtRebind(bool i_bPerformer) const
+{
+	QVariantMap look;
+	QMetaObject::invokeMethod(
+	    m_pDocument, "LookAtRebind", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, look), Q_ARG(bool, i_bPerformer));
+	return look;
+}
+
+void VRetargetPanel::Rebind(bool i_bPerformer, bool i_bMeasure)
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(m_pDocument, "Rebind", Q_ARG(bool, i_bPerformer), Q_ARG(bool, i_bMeasure));
 }
 
 QStringList VRetargetPanel::SegmentsOf(const char* i_pModel) const

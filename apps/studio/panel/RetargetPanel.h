@@ -79,14 +79,26 @@ public:
 	/// The next edit is a step of its own, even of the same field.
 	void EndStep();
 
+	/// The steps since the target subject was made or loaded, as commands of the command line; empty if there are none,
+	/// which is told.
+	QString SessionCommands();
+	/// False, with the reason told, if it could not be written.
+	bool SaveRecipe(const QString& i_rPath);
+
 	/// What the document proposes, see its function of this name; empty if it proposes nothing, which is told.
 	QVariantMap ProposeTargets(double i_LeastScore);
+	/// The document's function of this name.
+	QVariantMap FitPreset(const QString& i_rPath, double i_LeastScore);
+	/// False, with the reason told, if it could not be written.
+	bool SavePreset(const QString& i_rPath);
 	/// In one step.
 	void AddTargets(const QVariantList& i_rTargets);
 	// The document's functions of these names.
-	QVariantMap AlignToSource(const QVariantList& i_rChains);
+	QVariantMap AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked);
 	bool IsAligning() const;
 	void EndAlignment(bool i_bKeep);
+	QVariantMap LookAtRebind(bool i_bPerformer) const;
+	void Rebind(bool i_bPerformer, bool i_bMeasure);
 	/// By name.
 	QStringList SourceSegments() const { return SegmentsOf("SourceSegmentModel"); }
 	QStringList TargetSegments() const { return SegmentsOf("TargetSegmentModel"); }
@@ -132,6 +144,9 @@ signals:
 	/// The current file is another one, or what is unsaved has changed.
 	void stateChanged();
 
+	/// The character's file has other bones, or another performer was chosen.
+	void rebindCalledFor(bool i_bPerformer);
+
 	/// The segments of performer or character may be others.
 	void segmentsChanged();
 
@@ -142,6 +157,7 @@ private:
 	    std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters);
 
 	QString AskDocument(const char* i_pQuestion) const;
+	bool SaveBy(const char* i_pCommand, const QString& i_rPath);
 	std::shared_ptr<TesselPluginInterface::IParameter> Parameter(const char* i_pName) const;
 	bool SetParameter(const char* i_pName, const QString& i_rPath);
 	void FollowRootItem();

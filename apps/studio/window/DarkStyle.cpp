@@ -59,6 +59,8 @@ void ApplyDarkStyle(QApplication& io_rApplication)
 	    "QTabBar::tab:selected { color: #ffffff; background: #2a2d30; border-bottom: 2px solid %1; }"
 	    "QMainWindow::separator { background: #212427; width: 4px; height: 4px; }"
 	    "QMainWindow::separator:hover { background: %1; }"
+	    "QCheckBox::indicator:unchecked, QAbstractItemView::indicator:unchecked { width: 13px; height: 13px;"
+	    " border: 1px solid #757b82; border-radius: 2px; background: #212427; }"
 	    "QLineEdit:focus, QComboBox:focus { border: 1px solid %1; }")
 	                                  .arg(c_Active.name()));
 }

@@ -27,8 +27,8 @@ namespace StudioHost
 namespace
 {
 
-/// What this panel works with: the first of EPathTypes, and takes.
-constexpr std::size_t c_FoldersFirst = 5;
+/// What this panel works with: the first of EPathTypes, takes and presets.
+constexpr std::size_t c_FoldersFirst = 6;
 
 constexpr const char* c_pProducts[] = {"Orlex Rally", "Orlex Stage"};
 
@@ -56,8 +56,9 @@ VPreferencesDialog::VPreferencesDialog(VPreferences& i_rPreferences, QWidget* i_
 	std::vector<std::pair<std::string, QString>> folders, products;
 	for (std::size_t i = 0; i < TesselPluginInterface::c_FolderKeys.size(); ++i)
 		folders.emplace_back(TesselPluginInterface::c_FolderKeys[i], FolderLabels()[i]);
-	folders.insert(
-	    folders.begin() + c_FoldersFirst - 1, {c_pTakesFolderKey, tr("Takes (recorded motion of performers)")});
+	folders.insert(folders.begin() + c_FoldersFirst - 2,
+	    {{c_pTakesFolderKey, tr("Takes (recorded motion of performers)")},
+	        {c_pPresetsFolderKey, tr("Presets (pairs for several characters)")}});
 	for (const char* pProduct : c_pProducts)
 		products.emplace_back(UtilsFileSystem::ProductFolderKey(pProduct), QLatin1String(pProduct));
 

@@ -10,7 +10,10 @@
 #include "studio/motion/TakePlayer.h"
 #include "studio/window/StudioWindow.h"
 
+#include <QApplication>
 #include <QBuffer>
+#include <QDialog>
+#include <QPainter>
 #include <QPixmap>
 #include <QQuickWidget>
 #include <QQuickWindow>
@@ -53,12 +56,29 @@ bool VScreenshot::AtRest() const
 	    && m_rWindow.Motion().AtRest();
 }
 
+QPixmap VScreenshot::Picture() const
+{
+	QPixmap picture = m_rWindow.grab();
+	QPainter painter(&picture);
+	// Dialogs are windows of their own.
+	for (QWidget* const pWidget : QApplication::topLevelWidgets())
+	{
+		if (!pWidget->isVisible() || !qobject_cast<QDialog*>(pWidget))
+			continue;
+		const QRect place(pWidget->geometry().topLeft() - m_rWindow.geometry().topLeft(), pWidget->size());
+		painter.drawPixmap(place.topLeft(), pWidget->grab());
+		painter.setPen(pWidget->palette().color(QPalette::Mid));
+		painter.drawRect(place.adjusted(-1, -1, 0, 0));
+	}
+	return picture;
+}
+
 bool VScreenshot::Save() const
 {
 	QByteArray bytes;
 	QBuffer buffer(&bytes);
 	std::string error = "The picture could not be made";
-	if (m_rWindow.grab().save(&buffer, "PNG")
+	if (Picture().save(&buffer, "PNG")
 	    && UtilsFileSystem::SaveFile(UtilsFileSystem::PathFromUtf8(m_Path.toStdString()),
 	           {bytes.constData(), std::size_t(bytes.size())}, error)
 	        == NVX::Status::c_Success)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QObject>
+#include <QPixmap>
 #include <QString>
 
 class QQuickWidget;
@@ -27,6 +28,8 @@ signals:
 private:
 	void OnDrawn();
 	bool AtRest() const;
+	/// The window with the dialogs over it.
+	QPixmap Picture() const;
 	bool Save() const;
 
 	VStudioWindow& m_rWindow;

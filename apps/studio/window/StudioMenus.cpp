@@ -1,5 +1,6 @@
 #include "studio/window/StudioWindow.h"
 
+#include "DebugServices/GlobalLog.h"
 #include "TesselPluginInterface/IPreferenceFolders.h"
 #include "TesselPluginInterface/PathTypes.h"
 #include "UtilsFileSystem/Paths.h"
@@ -14,17 +15,21 @@
 #include "studio/window/Named.h"
 #include "studio/window/PreferencesDialog.h"
 #include "studio/window/ProposeDialog.h"
+#include "studio/window/RebindDialog.h"
 
 #include <QAction>
+#include <QClipboard>
 #include <QDialog>
 #include <QDockWidget>
 #include <QFile>
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QGuiApplication>
 #include <QMenu>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QTextBrowser>
+#include <QTimer>
 #include <QVBoxLayout>
 
 #include <tuple>
@@ -73,6 +78,10 @@ constexpr VCommandRow c_CommandRows[] = {
         "Workspace3d:ScaleDownManipulator"}};
 
 } // namespace
+
+const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 3> VStudioWindow::c_Dialogs = {
+    {{"align", &VStudioWindow::ShowAlignment}, {"preferences", &VStudioWindow::ShowPreferences},
+        {"propose", &VStudioWindow::ShowProposal}}};
 
 QAction* VStudioWindow::AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText,
     const QKeySequence& i_rShortcut, std::function<void()> i_Run)
@@ -140,6 +149,10 @@ void VStudioWindow::MakeEditMenu()
 	    AddAction(rMenu, "Undo", {}, QKeySequence(QStringLiteral("Ctrl+Z")), [this] { UndoOrRedo(true); });
 	QAction* const pRedo = AddAction(rMenu, "Redo", {}, {}, [this] { UndoOrRedo(false); });
 	pRedo->setShortcuts({QKeySequence(QStringLiteral("Ctrl+Shift+Z")), QKeySequence(QStringLiteral("Ctrl+Y"))});
+	rMenu.addSeparator();
+	AddAction(rMenu, "CopyCommands", tr("Copy as &Commands"), QKeySequence(QStringLiteral("Ctrl+Shift+C")),
+	    [this] { CopyCommands(); });
+	AddAction(rMenu, "SaveRecipe", tr("Save as Re&cipe..."), {}, [this] { SaveRecipe(); });
 	// As with Save: the shortcut tells why nothing happens.
 	connect(&rMenu, &QMenu::aboutToShow, this, [this] { UpdateEditActions(true); });
 	connect(&rMenu, &QMenu::aboutToHide, this, [this] { UpdateEditActions(false); });
@@ -156,6 +169,28 @@ void VStudioWindow::MakeEditMenu()
 				        m_pRetargetPanel->EndStep();
 		        });
 	    });
+}
+
+void VStudioWindow::CopyCommands()
+{
+	const QString commands = m_pRetargetPanel ? m_pRetargetPanel->SessionCommands() : QString();
+	if (commands.isEmpty())
+		return;
+	QGuiApplication::clipboard()->setText(commands);
+	NVX_LOG("Command", NVX::ELogInformation, "The steps were copied as a command line for a shell: %1% lines",
+	    commands.count('\n'));
+}
+
+void VStudioWindow::SaveRecipe()
+{
+	if (!m_pRetargetPanel)
+		return;
+	const QString file =
+	    AskWhereToSave(FolderOf(TesselPluginInterface::c_FolderKeys[TesselPluginInterface::EPathRetargets]),
+	        tr("Recipes (*.json)"), QStringLiteral(".json"));
+	if (!file.isEmpty() && m_pRetargetPanel->SaveRecipe(file))
+		NVX_LOG("Command", NVX::ELogInformation, "The steps were saved as a recipe: retarget build %1%",
+		    file.toStdString());
 }
 
 void VStudioWindow::UndoOrRedo(bool i_bBack)
@@ -209,6 +244,47 @@ void VStudioWindow::MakeToolsMenu()
 	AddAction(rMenu, "ProposeTargets", tr("&Propose Targets..."), QKeySequence(QStringLiteral("Ctrl+P")),
 	    [this] { ShowProposal(); });
 	AddAction(rMenu, "AlignToSourceAction", tr("&Align to Source..."), {}, [this] { ShowAlignment(); });
+	AddAction(rMenu, "RebindToFbx", tr("Re-bind to the &FBX..."), {}, [this] { ShowRebind(false, true); });
+	AddAction(rMenu, "RebindToPerformer", tr("Re-bind to the Pe&rformer..."), {}, [this] { ShowRebind(true, true); });
+	rMenu.addSeparator();
+	AddAction(rMenu, "SavePreset", tr("&Save Targets as Preset..."), {}, [this] { SavePreset(); });
+}
+
+std::vector<std::string> VStudioWindow::Dialogs()
+{
+	std::vector<std::string> names;
+	for (const auto& [pName, pShow] : c_Dialogs)
+		names.emplace_back(pName);
+	return names;
+}
+
+void VStudioWindow::OpenDialogSoon(const std::string& i_rName)
+{
+	m_pDispatcher->Post(
+	    [this, i_rName]
+	    {
+		    // This one counts, too.
+		    if (m_pDispatcher->PendingCount() > 1)
+			    return OpenDialogSoon(i_rName);
+		    for (const auto& [pName, pShow] : c_Dialogs)
+			    if (i_rName == pName)
+				    QTimer::singleShot(0, this, pShow);
+	    });
+}
+
+QString VStudioWindow::FolderOf(const char* i_pKey) const
+{
+	return QString::fromStdString(UtilsFileSystem::ToUtf8(m_pContext->Preferences().Folder(i_pKey)));
+}
+
+void VStudioWindow::SavePreset()
+{
+	if (!m_pRetargetPanel)
+		return;
+	const QString file = AskWhereToSave(FolderOf(c_pPresetsFolderKey), tr("Presets (*.json)"), QStringLiteral(".json"));
+	if (!file.isEmpty() && m_pRetargetPanel->SavePreset(file))
+		NVX_LOG("Command", NVX::ELogInformation, "The pairs of the target subject are saved as the preset %1%",
+		    file.toStdString());
 }
 
 void VStudioWindow::ShowProposal()
@@ -220,7 +296,23 @@ void VStudioWindow::ShowProposal()
 	}
 	// Why there is none is told.
 	if (m_pRetargetPanel && !m_pRetargetPanel->ProposeTargets(0.0).isEmpty())
-		(new VProposeDialog(*m_pRetargetPanel, m_pContext->GetSelectionManager()->Selection(), this))->show();
+		(new VProposeDialog(
+		     *m_pRetargetPanel, m_pContext->GetSelectionManager()->Selection(), FolderOf(c_pPresetsFolderKey), this))
+		    ->show();
+}
+
+void VStudioWindow::ShowRebind(bool i_bPerformer, bool i_bAsked)
+{
+	if (!m_pRetargetPanel)
+		return;
+	delete findChild<QDialog*>(QStringLiteral("Rebind"));
+	const QVariantMap look = m_pRetargetPanel->LookAtRebind(i_bPerformer);
+	// Nobody has asked for what has no answer.
+	if (!look.isEmpty() && (i_bAsked || !look.contains("refusal")))
+		(new VRebindDialog(*m_pRetargetPanel, i_bPerformer, look, this))->show();
+	else if (i_bAsked)
+		NVX_LOG("Command", NVX::ELogInformation, "Re-bind: there is nothing that %1% asks for",
+		    i_bPerformer ? "the performer" : "the FBX file");
 }
 
 void VStudioWindow::ShowAlignment()
@@ -232,7 +324,7 @@ void VStudioWindow::ShowAlignment()
 	}
 	if (!m_pRetargetPanel)
 		return;
-	auto* const pDialog = new VAlignDialog(*m_pRetargetPanel, this);
+	auto* const pDialog = new VAlignDialog(*m_pRetargetPanel, m_pContext->GetSelectionManager()->Selection(), this);
 	if (pDialog->Align())
 		return pDialog->show();
 	m_pRetargetPanel->EndAlignment(false);
@@ -265,25 +357,23 @@ void VStudioWindow::AskAndOpen(int i_Kind)
 		if (int(rRow.m_Kind) != i_Kind)
 			continue;
 		const char* const pKey = TesselPluginInterface::c_FolderKeys[rRow.m_Folder];
-		const QString folder = QString::fromStdString(UtilsFileSystem::ToUtf8(m_pContext->Preferences().Folder(pKey)));
-		const QString file = QFileDialog::getOpenFileName(
-		    this, tr("Choose a file"), folder, DialogFilter(rRow.m_Kind) + QStringLiteral(";;") + tr("All files (*)"));
+		const QString file = QFileDialog::getOpenFileName(this, tr("Choose a file"), FolderOf(pKey),
+		    DialogFilter(rRow.m_Kind) + QStringLiteral(";;") + tr("All files (*)"));
 		if (!file.isEmpty())
 			Open(file);
 	}
 }
 
-QString VStudioWindow::AskWhereToSave()
+QString VStudioWindow::AskWhereToSave(const QString& i_rFolder, const QString& i_rFilter, const QString& i_rExtension)
 {
-	const char* const pKey = TesselPluginInterface::c_FolderKeys[TesselPluginInterface::EPathRetargets];
-	QString file = QString::fromStdString(UtilsFileSystem::ToUtf8(m_pContext->Preferences().Folder(pKey)));
+	QString file = i_rFolder;
 	for (;;)
 	{
 		file = QFileDialog::getSaveFileName(
-		    this, tr("Choose a file"), file, tr("Subject files (*.qrr)"), nullptr, QFileDialog::DontConfirmOverwrite);
+		    this, tr("Choose a file"), file, i_rFilter, nullptr, QFileDialog::DontConfirmOverwrite);
 		// A file of another extension would be none that the dialogs show.
-		if (!file.isEmpty() && KindOf(file) != EFileKind::ETarget)
-			file += QStringLiteral(".qrr");
+		if (!file.isEmpty() && !file.endsWith(i_rExtension, Qt::CaseInsensitive))
+			file += i_rExtension;
 		if (file.isEmpty() || !QFileInfo::exists(file)
 		    || QMessageBox::warning(this, tr("Save As"),
 		           tr("%1 is there already. Do you want to replace it?").arg(QFileInfo(file).fileName()),

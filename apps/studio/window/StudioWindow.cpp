@@ -1,6 +1,7 @@
 #include "studio/window/StudioWindow.h"
 
 #include "DebugServices/GlobalLog.h"
+#include "TesselPluginInterface/PathTypes.h"
 #include "studio/host/ApplicationObject.h"
 #include "studio/host/Module.h"
 #include "studio/host/Services.h"
@@ -137,6 +138,9 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::fileUsed, m_pRecentFiles.get(), &VRecentFiles::Add);
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::saveFailed, this, &VStudioWindow::ShowSaveFailure);
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::stateChanged, this, &VStudioWindow::UpdateTitle);
+		connect(
+		    m_pRetargetPanel.get(), &VRetargetPanel::rebindCalledFor, this,
+		    [this](bool i_bPerformer) { ShowRebind(i_bPerformer, false); }, Qt::QueuedConnection);
 		// Beside the settings, which are another user's or test's elsewhere.
 		m_pWorkKeeper = std::make_unique<VWorkKeeper>(*m_pRetargetPanel,
 		    QFileInfo(m_rSettings.fileName()).absoluteDir().filePath(QStringLiteral("unsaved-work")));
@@ -156,7 +160,7 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 void VStudioWindow::UnloadModule()
 {
 	m_pWorkKeeper.reset();
-	for (const char* const pDialog : {"ProposeTargets", "AlignToSource"})
+	for (const char* const pDialog : {"ProposeTargets", "AlignToSource", "Rebind"})
 		delete findChild<QDialog*>(QLatin1String(pDialog));
 	m_pRetargetPanel.reset();
 	UpdateTitle();
@@ -279,7 +283,8 @@ bool VStudioWindow::SaveChanges()
 {
 	QString file = m_pRetargetPanel->CurrentFile();
 	if (file.isEmpty() || m_pRetargetPanel->IsCurrentFileReadOnly())
-		file = AskWhereToSave();
+		file = AskWhereToSave(FolderOf(TesselPluginInterface::c_FolderKeys[TesselPluginInterface::EPathRetargets]),
+		    tr("Subject files (*.qrr)"), QStringLiteral(".qrr"));
 	if (file.isEmpty())
 		return false;
 	m_pRetargetPanel->SaveTo(file);

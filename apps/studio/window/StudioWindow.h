@@ -3,7 +3,12 @@
 #include <QMainWindow>
 #include <QSettings>
 
+#include <array>
+#include <functional>
 #include <memory>
+#include <string>
+#include <utility>
+#include <vector>
 
 class QLabel;
 
@@ -43,6 +48,11 @@ public:
 	void OpenTake(const QString& i_rPath, std::size_t i_Frame = 0);
 	VTakePlayer& Motion();
 
+	/// What OpenDialogSoon takes.
+	static std::vector<std::string> Dialogs();
+	/// Opens a dialog by its name, behind what the files that were opened have still to do.
+	void OpenDialogSoon(const std::string& i_rName);
+
 	/// Runs a named command on the panels.
 	bool Execute(const QString& i_rCommand);
 
@@ -69,6 +79,9 @@ protected:
 	void closeEvent(QCloseEvent* i_pEvent) override;
 
 private:
+	/// Names of dialogs and what shows them.
+	static const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 3> c_Dialogs;
+
 	void MakeMenus(bool i_bDeveloper);
 	void MakeFileMenu();
 	void MakeEditMenu();
@@ -85,10 +98,17 @@ private:
 	/// Those that a job begins with, and the preferences.
 	QList<QAction*> StartActions() const;
 	/// @return empty if no file was chosen.
-	QString AskWhereToSave();
+	QString AskWhereToSave(const QString& i_rFolder, const QString& i_rFilter, const QString& i_rExtension);
+	/// Of the preferences; empty if it is not set.
+	QString FolderOf(const char* i_pKey) const;
 	void UpdateRecentFiles();
+	void CopyCommands();
+	void SaveRecipe();
+	void SavePreset();
 	void ShowProposal();
 	void ShowAlignment();
+	/// @param i_bAsked the operator wants to know, even that there is nothing to do.
+	void ShowRebind(bool i_bPerformer, bool i_bAsked);
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
 	void ShowOperatorPage();

@@ -1,5 +1,6 @@
 #include "RetargetSetupCore/FilePath.h"
 
+#include "FileDigest/FileDigest.h"
 #include "UtilsFileSystem/Paths.h"
 
 namespace RetargetSetup
@@ -16,6 +17,12 @@ std::string FileExtension(const boost::filesystem::path& i_rPath)
 	const std::string name = UtilsFileSystem::ToUtf8(i_rPath.filename());
 	const std::size_t dot = name.rfind('.');
 	return dot == std::string::npos ? std::string() : name.substr(dot);
+}
+
+std::optional<std::string> DigestOf(const boost::filesystem::path& i_rPath)
+{
+	std::string reason;
+	return FileDigest::Sha256(i_rPath, reason);
 }
 
 } // namespace RetargetSetup

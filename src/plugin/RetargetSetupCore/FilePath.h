@@ -2,6 +2,7 @@
 
 #include <boost/filesystem/path.hpp>
 
+#include <optional>
 #include <string>
 
 namespace RetargetSetup
@@ -12,5 +13,8 @@ std::string FileStem(const boost::filesystem::path& i_rPath);
 
 /// The file name from its last dot on; empty if it has none.
 std::string FileExtension(const boost::filesystem::path& i_rPath);
+
+/// SHA-256 of what a file holds; none if it cannot be read.
+std::optional<std::string> DigestOf(const boost::filesystem::path& i_rPath);
 
 } // namespace RetargetSetup

@@ -1,10 +1,12 @@
 #pragma once
 
 #include "RetargetSetupCore/TargetState.h"
+#include "SetupIO/Setup.h"
 
 #include <cstddef>
 #include <cstdint>
 #include <deque>
+#include <vector>
 
 namespace RetargetSetup
 {
@@ -21,6 +23,8 @@ struct VEdit
 	std::uint64_t m_Way = 0;
 	/// Brings the name of another source along.
 	bool m_bNamesSource = false;
+	/// As recipes have it; empty for what is seen from what has changed.
+	std::vector<SetupIO::VEdit> m_Commands = {};
 };
 
 /// The states of a target subject that edits have taken the place of, and those that were gone back from. Values are

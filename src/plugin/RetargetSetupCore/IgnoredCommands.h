@@ -24,6 +24,10 @@ inline constexpr const char* c_OwnJoints =
 inline constexpr const char* c_HostRefused = "The host took no item for the change, so everything stays as it was.";
 inline constexpr const char* c_TargetKept = "The target subject has changes that are not saved, and stays.";
 inline constexpr const char* c_PairsAreThere = "There is nothing to add: all these targets are there already.";
+inline constexpr const char* c_NoPairs =
+    "The target subject has no position or rotation target that a preset could hold. Add targets first.";
+inline constexpr const char* c_BeginningGone =
+    "What the steps began with is in no file any more. \"Save as Recipe\" keeps it in a file beside the recipe.";
 inline constexpr const char* c_NothingToUndo = "There is nothing to undo.";
 inline constexpr const char* c_NothingToRedo = "There is nothing to redo.";
 /// The target's name is %1%.

@@ -1,6 +1,11 @@
 #include "RetargetSetupCore/Presets.h"
 
+#include "NVX/Status.h"
 #include "RetargetSetupCore/RetargetTargets.h"
+#include "SetupIO/Limits.h"
+#include "SetupIO/ReadSetup.h"
+#include "UtilsFileSystem/Files.h"
+#include "UtilsFileSystem/Paths.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -69,6 +74,18 @@ std::vector<SetupIO::VPair> PairsOf(const VSubjectParametrised& i_rSubject, std:
 	return pairs;
 }
 
+SetupIO::VSetup PresetOf(const VSubjectParametrised& i_rSubject,
+    const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData, std::vector<std::string>& o_rLeftOut)
+{
+	const auto orElse = [](const std::string& i_rName, const char* i_pElse)
+	{ return i_rName.empty() ? i_pElse : i_rName; };
+	SetupIO::VSetup preset;
+	preset.m_Pairs = PairsOf(i_rSubject, o_rLeftOut);
+	preset.m_Comment = "Pairs of " + orElse(i_rApplicationData.m_RetargetSourceTemplate, "a performer") + " and "
+	    + orElse(i_rApplicationData.m_Skin, "a character");
+	return preset;
+}
+
 VPresetFit FitPreset(const std::vector<SetupIO::VPair>& i_rPairs, const VSubjectParametrised& i_rSource,
     const VSubjectParametrised& i_rTarget, const SetupProposal::VProposal* i_pProposal)
 {
@@ -119,6 +136,31 @@ VPresetFit FitPreset(const std::vector<SetupIO::VPair>& i_rPairs, const VSubject
 		fit.m_Misfits.push_back({rPair, reason});
 	}
 	return fit;
+}
+
+std::optional<std::vector<SetupIO::VPair>> ReadPreset(const boost::filesystem::path& i_rPath, std::string& o_rReason)
+{
+	const std::string path = UtilsFileSystem::ToUtf8(i_rPath);
+	std::string text;
+	if (UtilsFileSystem::ReadWholeFile(i_rPath, SetupIO::Limits::c_FileBytes, text, o_rReason)
+	    != NVX::Status::c_Success)
+	{
+		o_rReason = "'" + path + "' could not be read as a preset: " + o_rReason;
+		return std::nullopt;
+	}
+	SetupIO::VSetup preset;
+	SetupIO::VFault fault;
+	if (!SetupIO::ReadSetup(text, preset, fault) || !SetupIO::HasOnly(preset, {"pairs"}, "a preset", fault))
+	{
+		o_rReason = "'" + path + "', line " + std::to_string(fault.m_Line) + ": " + fault.m_Reason;
+		return std::nullopt;
+	}
+	if (preset.m_Pairs.empty())
+	{
+		o_rReason = "'" + path + "' holds no pairs.";
+		return std::nullopt;
+	}
+	return std::move(preset.m_Pairs);
 }
 
 } // namespace RetargetSetup

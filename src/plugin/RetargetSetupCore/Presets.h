@@ -1,10 +1,14 @@
 #pragma once
 
+#include "CoreOrlexTypes/SubjectApplicationData.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "SetupIO/Setup.h"
 #include "SetupProposal/Proposal.h"
 
+#include <boost/filesystem/path.hpp>
+
 #include <cstddef>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -16,6 +20,10 @@ namespace RetargetSetup
 /// @param o_rLeftOut a sentence for each target that no pair can hold.
 std::vector<SetupIO::VPair> PairsOf(
     const CoreOrlexTypes::VSubjectParametrised& i_rSubject, std::vector<std::string>& o_rLeftOut);
+
+/// A preset of a subject's pairs, with a comment on what they are of.
+SetupIO::VSetup PresetOf(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
+    const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData, std::vector<std::string>& o_rLeftOut);
 
 /// A pair of a preset that two subjects have.
 struct VFittedPair
@@ -40,6 +48,9 @@ struct VPresetFit
 	std::vector<VFittedPair> m_Fitted;
 	std::vector<VMisfit> m_Misfits;
 };
+
+/// The pairs of a file; nothing, with the reason, for one that cannot be read, is none or holds none.
+std::optional<std::vector<SetupIO::VPair>> ReadPreset(const boost::filesystem::path& i_rPath, std::string& o_rReason);
 
 /// By names first. Where one of the two is not there, by what is proposed for the other, unless another pair has that.
 /// @param i_pProposal of the same two subjects, with indices as theirs; null for names alone.

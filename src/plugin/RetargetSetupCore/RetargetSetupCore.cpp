@@ -7,7 +7,9 @@
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/RootHeight.h"
+#include "RetargetSetupCore/SessionSteps.h"
 #include "RetargetSetupCore/StepNames.h"
+#include "math/NumberText.h"
 
 #include <algorithm>
 
@@ -103,7 +105,8 @@ void VRetargetSetupCore::SetTargetScale(double i_Scale)
 		m_Target.m_NextScale = i_Scale;
 		return;
 	}
-	const VStep step(*this, {RetargetSetup::Steps::c_Scale});
+	const VStep step(
+	    *this, RetargetSetup::EditAs(RetargetSetup::Steps::c_Scale, "scale", NumberText::PrintShortest(i_Scale)));
 	m_Target.m_NextScale = i_Scale;
 	if (!dropped.empty())
 		NVX_LOG(c_LogCategory, NVX::ELogWarning, "The new scale drops the dynamic parameters '%1%'", dropped);
@@ -160,8 +163,9 @@ bool VRetargetSetupCore::GetTargetSubjectAndData(
 void VRetargetSetupCore::SetSourceSubject(
     VSubjectParametrised i_Parametrised, VSubjectApplicationData i_ApplicationData)
 {
-	Replace(m_SourceItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
-	    std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)));
+	if (Replace(m_SourceItems, std::make_shared<const VSubjectParametrised>(std::move(i_Parametrised)),
+	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData))))
+		m_SourceFile = {};
 }
 
 bool VRetargetSetupCore::SetTargetSubject(VSubjectParametrised i_Parametrised,
@@ -173,6 +177,7 @@ bool VRetargetSetupCore::SetTargetSubject(VSubjectParametrised i_Parametrised,
 		return false;
 	TakeExtras(std::move(i_Extras));
 	m_Target.m_AtRest = TargetValues();
+	BeginSession({});
 	return true;
 }
 

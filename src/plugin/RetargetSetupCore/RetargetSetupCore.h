@@ -5,6 +5,7 @@
 #include "RetargetSetupCore/BindPose.h"
 #include "RetargetSetupCore/History.h"
 #include "RetargetSetupCore/RetargetTargets.h"
+#include "RetargetSetupCore/SessionSteps.h"
 #include "RetargetSetupCore/SourceAlignment.h"
 #include "RetargetSetupCore/TargetState.h"
 #include "SetupProposal/Proposal.h"
@@ -16,6 +17,7 @@
 
 #include <boost/filesystem/path.hpp>
 
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -77,6 +79,13 @@ public:
 	std::string UndoName() const { return StepName(true); }
 	std::string RedoName() const { return StepName(false); }
 
+	/// The steps since the target subject was made or loaded as a command line that does them again, without what was
+	/// undone. Empty, and the command is ignored, where there is none or where what they began with is in no file.
+	std::string SessionCommands();
+	/// The same as a recipe, which gives the bytes that a save gives now. What the steps began with goes to a file
+	/// beside it if it is in none any more. False, and the command is ignored, if it could not be written.
+	bool SaveSessionRecipe(const boost::filesystem::path& i_rPath);
+
 	/// Fires at the beginning of Undo and Redo: whoever is in the middle of an edit ends it there.
 	NVX::VSignal<>& GetLeavingSignal() { return m_LeavingSignal; }
 
@@ -98,11 +107,19 @@ public:
 	/// Adds them in one step, with their weights; one that is there already is left as it is.
 	void AddTargets(const std::vector<RetargetSetup::VNewTarget>& i_rTargets);
 
+	/// The pairs that the targets tie, for other characters. Targets that no pair can hold are told.
+	/// @param o_rReason why it failed.
+	bool SavePreset(const boost::filesystem::path& i_rPath, std::string& o_rReason) const;
+
 	/// Brings the bind pose of the target subject to that of the source, and measures the offsets of all targets anew.
+	/// A subject that stands as it was made takes the pose of its FBX file first.
 	/// @param i_Way what several tries are one step by, see VEdit.
 	/// @return how it was brought there; nothing if there is no change.
 	std::optional<SetupProposal::VAlignment> AlignToSource(
 	    const RetargetSetup::VAlignmentChoice& i_rChoice, std::uint64_t i_Way = 0);
+
+	/// Each joint that there still is stands as it did when the subject was made or loaded, and not as in its FBX file.
+	bool AlignsFromFilePose() const;
 
 	/// Gives every segment a joint; those that have one keep it.
 	void CreateAllJoints();
@@ -266,6 +283,9 @@ protected:
 	/// @return whether the whole file was written.
 	bool SaveTargetSubjectBy(const char* i_pCommand, const boost::filesystem::path& i_rPath);
 
+	/// Several edits as one step.
+	void RunStep(const char* i_pName, const std::function<void()>& i_rEdits);
+
 	// What whoever shows the document tells on. Here they do nothing.
 
 	/// The subjects are others, and the change signal is about to fire.
@@ -305,8 +325,18 @@ private:
 		VRetargetSetupCore& m_rDocument;
 		const RetargetSetup::VEdit m_Edit;
 		const bool m_bOutermost;
+		bool m_bGoesOn = false;
 		std::optional<RetargetSetup::VTargetState> m_Before;
 	};
+
+	/// The target subject stands at the beginning of what a recipe tells.
+	/// @param i_Beginning without what the document itself knows.
+	void BeginSession(RetargetSetup::VBeginning i_Beginning);
+	void OpenSessionStep(const RetargetSetup::VEdit& i_rEdit, const RetargetSetup::VTargetState& i_rBefore);
+	/// What a recipe tells of the step that is on its way is known now.
+	void CloseSessionStep();
+	/// With absolute paths; nothing, and the command is ignored, without a target subject.
+	std::optional<SetupIO::VSetup> SessionRecipe(const char* i_pCommand);
 
 	void Move(bool i_bBack);
 	std::string StepName(bool i_bBack) const;
@@ -361,6 +391,10 @@ private:
 	/// Of the FBX file that was read last, the bones that the target subject's segments were made of; empty if it was
 	/// made of another file.
 	FBXIO::VSkinSkeleton BonesOfTarget() const;
+	/// The target subject in the pose of its file.
+	/// @return nothing, with the reason, where it cannot take it.
+	std::optional<CoreOrlexTypes::VSubjectParametrised> InFilePose(const char*& o_rpReason) const;
+	bool StandsAsMade() const;
 	void UpdatePoseNote();
 	/// What the root's height is multiplied by at a scale.
 	double RootFactor(double i_Scale) const { return ScaleRootHeight() ? i_Scale : 1.0; }
@@ -381,6 +415,8 @@ private:
 	const NVX::CountedPointer<TesselPluginInterface::IItemFactory> m_pItemFactory;
 	std::shared_ptr<TesselPluginInterface::IHostRules> m_pHostRules;
 	std::shared_ptr<const FBXIO::VSkinSkeleton> m_pFBXSkeleton;
+	RetargetSetup::VReadFile m_TargetFBXFile;
+	RetargetSetup::VReadFile m_SourceFile;
 	std::string m_TargetName;
 	std::string m_TargetFBXError;
 	std::string m_SourceName;

@@ -5,7 +5,6 @@
 #include "CoreOrlexQRTIO/Writer.h"
 #include "DebugServices/GlobalLog.h"
 #include "FBXIO/FBXReader.h"
-#include "FileDigest/FileDigest.h"
 #include "NVX/Status.h"
 #include "RetargetSetupCore/AngleAxis.h"
 #include "RetargetSetupCore/DefaultPose.h"
@@ -15,10 +14,12 @@
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/LegacyText.h"
+#include "RetargetSetupCore/Presets.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RootHeight.h"
 #include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupCore/TargetConstruction.h"
+#include "SetupIO/WriteSetup.h"
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
 
@@ -33,6 +34,7 @@ using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
 using CoreOrlexTypes::VSubjectRecord;
 using RetargetSetup::c_LogCategory;
+using RetargetSetup::DigestOf;
 using RetargetSetup::VTargetFile;
 using RetargetSetup::VTargetState;
 namespace Ignored = RetargetSetup::Ignored;
@@ -88,13 +90,6 @@ void TellSourceOfSaved(const std::string& i_rNamed, const std::string& i_rShown)
 	else if (i_rNamed != i_rShown)
 		NVX_LOG(c_LogCategory, NVX::ELogWarning,
 		    "The saved subject names source skeleton '%1%', and the one that is shown is '%2%'", i_rNamed, i_rShown);
-}
-
-/// Of what a file holds; none if it cannot be read.
-std::optional<std::string> DigestOf(const boost::filesystem::path& i_rPath)
-{
-	std::string reason;
-	return FileDigest::Sha256(i_rPath, reason);
 }
 
 /// Reads the file that is about to be written, in memory, and tells what would not come back.
@@ -155,6 +150,7 @@ bool VRetargetSetupCore::LoadTargetFBX(const boost::filesystem::path& i_rPath)
 		return false;
 	}
 	m_TargetName = RetargetSetup::FileStem(i_rPath);
+	m_TargetFBXFile = RetargetSetup::ReadNow(i_rPath);
 	m_bTargetRootChosen = false;
 	m_TargetAxisMatrix = ToZUp(reader.GetUpAxis());
 	return true;
@@ -189,6 +185,8 @@ void VRetargetSetupCore::CreateTargetSubject()
 	const bool bRootChosen = m_bTargetRootChosen;
 	const bool bPoseFromFile = HostRules().m_bPoseFromFile;
 	const double rootFactor = RootFactor(RetargetSetup::GetGlobalScale(subject));
+	RetargetSetup::VBeginning beginning = RetargetSetup::MadeOf(
+	    m_TargetFBXFile, *pSkeleton, m_TargetRootIndex, m_SourceName, m_Target.m_NextScale, bPoseFromFile);
 	if (!MayReplaceTarget(c_Command, Steps::c_Create))
 		return;
 	if (!bRootChosen)
@@ -223,6 +221,7 @@ void VRetargetSetupCore::CreateTargetSubject()
 		return CommandIgnored(c_Command, Ignored::c_HostRefused);
 	m_Target.m_pFile = NewFile();
 	m_Target.m_pFile->m_Made = TargetValues();
+	BeginSession(std::move(beginning));
 	UnsavedChangesChanged();
 	TargetSubjectCreated();
 }
@@ -263,6 +262,7 @@ bool VRetargetSetupCore::LoadSourceSubject(const boost::filesystem::path& i_rPat
 	        std::make_shared<const VSubjectApplicationData>(std::move(applicationData))))
 	{
 		m_ShownSourceName = m_SourceName;
+		m_SourceFile = RetargetSetup::ReadNow(i_rPath);
 		return true;
 	}
 	m_SourceName = std::move(sourceName);
@@ -296,6 +296,7 @@ std::uint32_t VRetargetSetupCore::LoadTargetSubject(const boost::filesystem::pat
 	m_Target.m_AtRest = TargetValues();
 	m_Target.m_pFile = NewFile();
 	RememberTargetFile(i_rPath, TargetValues());
+	BeginSession({.m_Subject = i_rPath, .m_Digest = m_Target.m_pFile->m_Digest});
 	UnsavedChangesChanged();
 	return NVX::Status::c_Success;
 }
@@ -344,6 +345,22 @@ bool VRetargetSetupCore::WriteCopy(const boost::filesystem::path& i_rPath, std::
 		o_rReason = errors.empty() ? std::string() : errors.front();
 	else
 		return UtilsFileSystem::SaveFile(i_rPath, text, o_rReason) == NVX::Status::c_Success;
+	return false;
+}
+
+bool VRetargetSetupCore::SavePreset(const boost::filesystem::path& i_rPath, std::string& o_rReason) const
+{
+	const VSubjectValues target = TargetValues();
+	std::vector<std::string> leftOut;
+	SetupIO::VSetup preset;
+	if (target.m_pParametrised && target.m_pApplicationData)
+		preset = RetargetSetup::PresetOf(*target.m_pParametrised, *target.m_pApplicationData, leftOut);
+	for (const std::string& rSentence : leftOut)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "%1%", rSentence);
+	if (preset.m_Pairs.empty())
+		o_rReason = target.m_pParametrised ? Ignored::c_NoPairs : Ignored::c_NoTarget;
+	else
+		return UtilsFileSystem::SaveFile(i_rPath, SetupIO::WriteSetup(preset), o_rReason) == NVX::Status::c_Success;
 	return false;
 }
 

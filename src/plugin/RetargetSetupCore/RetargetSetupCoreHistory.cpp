@@ -1,11 +1,21 @@
 // What VRetargetSetupCore keeps of what edits replace, and brings back.
 
+#include "CoreOrlexQRTIO/Writer.h"
 #include "DebugServices/GlobalLog.h"
+#include "FileDigest/FileDigest.h"
+#include "NVX/Status.h"
+#include "RetargetSetupCore/FilePath.h"
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
+#include "SetupIO/CommandText.h"
+#include "SetupIO/WriteSetup.h"
 #include "TesselPluginInterface/IDispatcher.h"
 #include "TesselPluginInterface/ISelectionManager.h"
+#include "UtilsFileSystem/Paths.h"
+#include "UtilsFileSystem/SaveFile.h"
+
+#include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
 #include <iterator>
@@ -13,14 +23,21 @@
 #include <utility>
 
 using RetargetSetup::c_LogCategory;
+using RetargetSetup::VBeginning;
 using RetargetSetup::VEdit;
+using RetargetSetup::VSessionStep;
 using RetargetSetup::VTargetFile;
+using RetargetSetup::VTargetState;
 
 VRetargetSetupCore::VStep::VStep(VRetargetSetupCore& io_rDocument, const VEdit& i_rEdit)
     : m_rDocument(io_rDocument), m_Edit(i_rEdit), m_bOutermost(!std::exchange(io_rDocument.m_bInStep, true))
 {
-	if (!m_bOutermost || !m_rDocument.m_History || m_rDocument.m_History->GoesOn(m_Edit))
+	if (!m_bOutermost || !m_rDocument.m_History)
 		return;
+	m_bGoesOn = m_rDocument.m_History->GoesOn(m_Edit);
+	if (m_bGoesOn)
+		return;
+	m_rDocument.CloseSessionStep();
 	m_Before = m_rDocument.m_Target;
 	m_Before->m_Selection = m_rDocument.Selected();
 	if (m_Edit.m_bNamesSource)
@@ -31,10 +48,13 @@ VRetargetSetupCore::VStep::~VStep()
 {
 	if (m_bOutermost)
 		m_rDocument.m_bInStep = false;
-	if (!m_Before || HoldTheSame(*m_Before, m_rDocument.m_Target))
-		return;
 	try
 	{
+		if (m_bGoesOn && m_rDocument.m_Target.m_pSteps)
+			m_rDocument.m_Target.m_pSteps->m_Edits = m_Edit.m_Commands;
+		if (!m_Before || HoldTheSame(*m_Before, m_rDocument.m_Target))
+			return;
+		m_rDocument.OpenSessionStep(m_Edit, *m_Before);
 		const bool bFits = m_rDocument.m_History->Add(m_Edit, std::move(*m_Before), m_rDocument.m_Target);
 		if (!bFits && !std::exchange(m_rDocument.m_bForgotTold, true))
 			NVX_LOG(c_LogCategory, NVX::ELogInformation,
@@ -43,9 +63,139 @@ VRetargetSetupCore::VStep::~VStep()
 	}
 	catch (const std::bad_alloc&)
 	{
-		// Without this edit the way back would lead to what never was.
+		// Without this edit the way back would lead to what never was, and so would the steps.
 		m_rDocument.m_History->Clear();
+		m_rDocument.m_Target.m_pSteps.reset();
 	}
+}
+
+void VRetargetSetupCore::RunStep(const char* i_pName, const std::function<void()>& i_rEdits)
+{
+	const VStep step(*this, {i_pName});
+	i_rEdits();
+	// What recipes know of the single ones they do not know of all.
+	if (m_Target.m_pSteps)
+		BeginSession({});
+}
+
+void VRetargetSetupCore::BeginSession(RetargetSetup::VBeginning i_Beginning)
+{
+	m_Target.m_pSteps.reset();
+	if (!m_History || !TargetValues().m_pParametrised)
+		return;
+	i_Beginning.m_bScaleRootHeight = ScaleRootHeight();
+	i_Beginning.m_Values = TargetValues();
+	i_Beginning.m_pExtras = m_Target.m_pExtras;
+	m_Target.m_pSteps = std::make_shared<VSessionStep>();
+	m_Target.m_pSteps->m_pBeginning = std::make_shared<const VBeginning>(std::move(i_Beginning));
+	m_Target.m_pSteps->m_Source = m_SourceFile;
+}
+
+void VRetargetSetupCore::OpenSessionStep(const VEdit& i_rEdit, const VTargetState& i_rBefore)
+{
+	// What begins anew has told so itself.
+	if (!i_rBefore.m_pSteps || m_Target.m_pSteps != i_rBefore.m_pSteps)
+		return;
+	m_Target.m_pSteps = std::make_shared<VSessionStep>();
+	m_Target.m_pSteps->m_pBefore = i_rBefore.m_pSteps;
+	m_Target.m_pSteps->m_Edits = i_rEdit.m_Commands;
+	m_Target.m_pSteps->m_Source = m_SourceFile;
+	m_Target.m_pSteps->m_Start = RetargetSetup::ValuesOf(i_rBefore.m_Items);
+	// The rest of a way may bring it back to where it began.
+	if (i_rEdit.m_Way == 0)
+		CloseSessionStep();
+}
+
+void VRetargetSetupCore::CloseSessionStep()
+{
+	const auto pStep = m_Target.m_pSteps;
+	if (!pStep || !pStep->m_Start.m_pParametrised)
+		return;
+	const VSubjectValues start = std::exchange(pStep->m_Start, {});
+	if (!pStep->m_Edits.empty())
+		return;
+	const auto pSource = SourceValues().m_pParametrised;
+	if (auto edits = RetargetSetup::EditsBetween(start, TargetValues(), pSource.get()))
+		pStep->m_Edits = std::move(*edits);
+	else
+		BeginSession({});
+	if (pStep->m_Edits.empty() && m_Target.m_pSteps == pStep)
+		m_Target.m_pSteps = pStep->m_pBefore;
+}
+
+std::optional<SetupIO::VSetup> VRetargetSetupCore::SessionRecipe(const char* i_pCommand)
+{
+	EndStep();
+	if (!m_Target.m_pSteps)
+	{
+		CommandIgnored(i_pCommand, RetargetSetup::Ignored::c_NoTarget);
+		return std::nullopt;
+	}
+	std::vector<std::string> changed;
+	SetupIO::VSetup recipe = RetargetSetup::RecipeOf(*m_Target.m_pSteps, changed);
+	for (const std::string& rSentence : changed)
+		NVX_LOG(c_LogCategory, NVX::ELogWarning, "%1%", rSentence);
+	recipe.m_Output = UtilsFileSystem::ToUtf8(m_Target.m_pFile->m_Path);
+	return recipe;
+}
+
+std::string VRetargetSetupCore::SessionCommands()
+{
+	std::optional<SetupIO::VSetup> recipe = SessionRecipe("CopyCommands");
+	if (!recipe)
+		return {};
+	if (recipe->m_Fbx.empty() && recipe->m_Subject.empty())
+	{
+		CommandIgnored("CopyCommands", RetargetSetup::Ignored::c_BeginningGone);
+		return {};
+	}
+	if (recipe->m_Output.empty())
+		recipe->m_Output = m_TargetName.empty() ? "out.qrr" : m_TargetName + ".qrr";
+	return SetupIO::CommandText(*recipe);
+}
+
+bool VRetargetSetupCore::SaveSessionRecipe(const boost::filesystem::path& i_rPath)
+{
+	constexpr const char* c_Command = "SaveRecipe";
+	std::optional<SetupIO::VSetup> recipe = SessionRecipe(c_Command);
+	if (!recipe)
+		return false;
+	std::string reason;
+	const auto fail = [&]
+	{
+		CommandIgnored(c_Command,
+		    RetargetSetup::Ignored::Text(RetargetSetup::Ignored::c_NotSaved, UtilsFileSystem::ToUtf8(i_rPath), reason));
+		return false;
+	};
+	const boost::filesystem::path folder = i_rPath.parent_path();
+	const std::string stem = RetargetSetup::FileStem(i_rPath);
+	// What it writes must not be what it reads.
+	if (recipe->m_Fbx.empty() && (recipe->m_Subject.empty() || recipe->m_Subject == recipe->m_Output))
+	{
+		const VBeginning& rBeginning = RetargetSetup::BeginningOf(*m_Target.m_pSteps);
+		std::string text;
+		std::vector<std::string> errors;
+		std::vector<std::string> warnings;
+		const bool bText = CoreOrlexQRTIO::VWriter().WriteText(*rBeginning.m_Values.m_pParametrised,
+		    *rBeginning.m_Values.m_pApplicationData, *rBeginning.m_pExtras, CoreOrlexQRTIO::c_AutomaticVersion, text,
+		    errors, warnings);
+		if (!bText)
+			reason = errors.empty() ? std::string() : errors.front();
+		// Another file of the name stays.
+		boost::filesystem::path beginning = folder / (stem + "-begin.qrr");
+		for (int number = 2; exists(beginning) && RetargetSetup::DigestOf(beginning) != FileDigest::Sha256OfBytes(text);
+		     ++number)
+			beginning = folder / (stem + "-begin-" + std::to_string(number) + ".qrr");
+		if (!bText || UtilsFileSystem::SaveFile(beginning, text, reason) != NVX::Status::c_Success)
+			return fail();
+		recipe->m_Subject = UtilsFileSystem::ToUtf8(beginning);
+		NVX_LOG(c_LogCategory, NVX::ELogInformation,
+		    "What the steps begin with is in no file any more, and is written to '%1%'", recipe->m_Subject);
+	}
+	if (recipe->m_Output.empty())
+		recipe->m_Output = UtilsFileSystem::ToUtf8(folder / (stem + ".qrr"));
+	RetargetSetup::MakeRelative(*recipe, folder);
+	return UtilsFileSystem::SaveFile(i_rPath, SetupIO::WriteSetup(*recipe), reason) == NVX::Status::c_Success || fail();
 }
 
 void VRetargetSetupCore::KeepHistory(
@@ -57,6 +207,7 @@ void VRetargetSetupCore::KeepHistory(
 
 void VRetargetSetupCore::EndStep()
 {
+	CloseSessionStep();
 	if (m_History)
 		m_History->EndStep(m_Target);
 }

@@ -1,5 +1,7 @@
 // The operations of VRetargetSetupCore that hold the target subject against the pose in its FBX file.
 
+#include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupCore/FilePose.h"
 #include "RetargetSetupCore/Identity.h"
@@ -7,13 +9,17 @@
 #include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RootHeight.h"
+#include "RetargetSetupCore/SessionSteps.h"
 #include "RetargetSetupCore/StepNames.h"
+#include "UtilsFileSystem/Paths.h"
 
 #include <boost/format.hpp>
 
+#include <algorithm>
 #include <cmath>
 #include <locale>
 #include <numbers>
+#include <span>
 
 using CoreOrlexTypes::VSubjectParametrised;
 using RetargetSetup::c_LogCategory;
@@ -45,24 +51,96 @@ std::optional<RetargetSetup::VPoseDifference> VRetargetSetupCore::DifferenceFrom
 	    *TargetValues().m_pParametrised, bones, m_TargetAxisMatrix, RootFactor(GetTargetScale()));
 }
 
+std::optional<VSubjectParametrised> VRetargetSetupCore::InFilePose(const char*& o_rpReason) const
+{
+	const VSubjectValues target = TargetValues();
+	const FBXIO::VSkinSkeleton bones = BonesOfTarget();
+	o_rpReason = !target.m_pParametrised || !target.m_pApplicationData ? Ignored::c_NoTarget
+	    : !m_pFBXSkeleton                                              ? Ignored::c_NoFBX
+	    : bones.empty()                                                ? Ignored::c_NotItsFBX
+	    : !RetargetSetup::HoldsFilePose(*target.m_pParametrised)       ? Ignored::c_OwnJoints
+	                                                                   : nullptr;
+	if (o_rpReason)
+		return std::nullopt;
+	VSubjectParametrised subject = *target.m_pParametrised;
+	RetargetSetup::MatchFilePoseAndTell(subject, bones, m_TargetAxisMatrix, RootFactor(GetTargetScale()));
+	return subject;
+}
+
 void VRetargetSetupCore::MatchFilePose()
 {
 	constexpr const char* c_Command = "MatchFilePose";
-	const VSubjectValues target = TargetValues();
-	if (!target.m_pParametrised || !target.m_pApplicationData)
-		return CommandIgnored(c_Command, Ignored::c_NoTarget);
-	if (!m_pFBXSkeleton)
-		return CommandIgnored(c_Command, Ignored::c_NoFBX);
-	const FBXIO::VSkinSkeleton bones = BonesOfTarget();
-	if (bones.empty())
-		return CommandIgnored(c_Command, Ignored::c_NotItsFBX);
-	if (!RetargetSetup::HoldsFilePose(*target.m_pParametrised))
-		return CommandIgnored(c_Command, Ignored::c_OwnJoints);
-	VSubjectParametrised subject = *target.m_pParametrised;
-	RetargetSetup::MatchFilePoseAndTell(subject, bones, m_TargetAxisMatrix, RootFactor(GetTargetScale()));
-	const VStep step(*this, {RetargetSetup::Steps::c_MatchFilePose});
-	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities))
+	const char* pReason = nullptr;
+	std::optional<VSubjectParametrised> subject = InFilePose(pReason);
+	if (!subject)
+		return CommandIgnored(c_Command, pReason);
+	const VStep step(*this,
+	    RetargetSetup::EditAs(RetargetSetup::Steps::c_MatchFilePose, RetargetSetup::c_FbxPoseCommand,
+	        UtilsFileSystem::ToUtf8(m_TargetFBXFile.m_Path)));
+	if (ReplaceTarget(c_Command, std::move(*subject), TargetValues().m_pApplicationData, m_Target.m_Identities))
 		m_Target.m_AtRest = TargetValues();
+}
+
+bool VRetargetSetupCore::StandsAsMade() const
+{
+	const auto pNow = TargetValues().m_pParametrised;
+	const auto pAtRest = TargetAtRest().m_pParametrised;
+	// A scale moves what is free along, and turns nothing.
+	constexpr std::size_t c_Turn = 3;
+	const auto turn = [](const VSubjectParametrised::VSegment& i_rSegment)
+	{
+		const std::vector<double>& rPose = i_rSegment.m_Joint.m_BindPose;
+		return std::span(rPose).first(std::min(rPose.size(), c_Turn));
+	};
+	return pNow && pAtRest
+	    && std::ranges::equal(pNow->m_Segments, pAtRest->m_Segments,
+	        [&](const VSubjectParametrised::VSegment& i_rNow, const VSubjectParametrised::VSegment& i_rThen)
+	        {
+		        return i_rNow.m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy
+		            || std::ranges::equal(turn(i_rNow), turn(i_rThen));
+	        });
+}
+
+bool VRetargetSetupCore::AlignsFromFilePose() const
+{
+	return StandsAsMade() && DifferenceFromFile() && RetargetSetup::HoldsFilePose(*TargetValues().m_pParametrised);
+}
+
+std::optional<SetupProposal::VAlignment> VRetargetSetupCore::AlignToSource(
+    const RetargetSetup::VAlignmentChoice& i_rChoice, std::uint64_t i_Way)
+{
+	constexpr const char* c_Command = "AlignToSource";
+	const std::optional<VBothPosed> both = BothPosed(c_Command);
+	if (!both)
+		return std::nullopt;
+	const VSubjectValues& source = both->m_Source;
+	VSubjectValues target = both->m_Target;
+	RetargetSetup::VEdit edit = RetargetSetup::AlignmentEdit(i_rChoice, *target.m_pParametrised);
+	edit.m_Way = i_Way;
+	if (!i_rChoice.m_bAsItStands && AlignsFromFilePose())
+	{
+		NVX_LOG(c_LogCategory, NVX::ELogInformation, "Aligning begins with the pose of the FBX file");
+		const char* pReason = nullptr;
+		auto pPosed = std::make_shared<const VSubjectParametrised>(InFilePose(pReason).value());
+		auto pConverted = std::make_shared<CoreOrlexTypes::VSubject>();
+		CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(*pPosed, *pConverted);
+		target.m_pParametrised = std::move(pPosed);
+		target.m_pSubject = std::move(pConverted);
+		edit.m_Commands.insert(edit.m_Commands.begin(),
+		    {RetargetSetup::c_FbxPoseCommand, UtilsFileSystem::ToUtf8(m_TargetFBXFile.m_Path), {}, 0});
+	}
+	else if (StandsAsMade())
+		edit.m_Commands.insert(edit.m_Commands.begin(), {RetargetSetup::c_AsItStandsCommand, {}, {}, 0});
+	std::string reason;
+	auto aligned = RetargetSetup::AlignToSource(
+	    *source.m_pParametrised, *source.m_pSubject, *target.m_pParametrised, *target.m_pSubject, i_rChoice, reason);
+	if (!aligned)
+	{
+		CommandIgnored(c_Command, reason);
+		return std::nullopt;
+	}
+	SetTargetSubjectParametrised(std::move(aligned->m_Subject), edit);
+	return std::move(aligned->m_Alignment);
 }
 
 void VRetargetSetupCore::SetScaleRootHeight(bool i_bScale)
@@ -71,7 +149,9 @@ void VRetargetSetupCore::SetScaleRootHeight(bool i_bScale)
 		return;
 	std::optional<VStep> step;
 	if (TargetValues().m_pParametrised)
-		step.emplace(*this, RetargetSetup::VEdit{RetargetSetup::Steps::c_ScaleRootHeight});
+		step.emplace(*this,
+		    RetargetSetup::EditAs(
+		        RetargetSetup::Steps::c_ScaleRootHeight, "switch-root-height", i_bScale ? "scale" : "keep"));
 	const double scale = GetTargetScale();
 	const double before = RootFactor(scale);
 	m_Target.m_bScaleRootHeight = i_bScale;

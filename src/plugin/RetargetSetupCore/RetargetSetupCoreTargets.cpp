@@ -11,6 +11,7 @@
 #include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
+#include "RetargetSetupCore/SessionSteps.h"
 #include "RetargetSetupCore/StepNames.h"
 
 #include <cmath>
@@ -211,27 +212,6 @@ std::optional<SetupProposal::VProposal> VRetargetSetupCore::ProposeTargets(doubl
 	    TargetSkeleton(), i_LeastScore);
 }
 
-std::optional<SetupProposal::VAlignment> VRetargetSetupCore::AlignToSource(
-    const RetargetSetup::VAlignmentChoice& i_rChoice, std::uint64_t i_Way)
-{
-	constexpr const char* c_Command = "AlignToSource";
-	const std::optional<VBothPosed> both = BothPosed(c_Command);
-	if (!both)
-		return std::nullopt;
-	const VSubjectValues& source = both->m_Source;
-	const VSubjectValues& target = both->m_Target;
-	std::string reason;
-	auto aligned = RetargetSetup::AlignToSource(
-	    *source.m_pParametrised, *source.m_pSubject, *target.m_pParametrised, *target.m_pSubject, i_rChoice, reason);
-	if (!aligned)
-	{
-		CommandIgnored(c_Command, reason);
-		return std::nullopt;
-	}
-	SetTargetSubjectParametrised(std::move(aligned->m_Subject), {Steps::c_Align, i_Way});
-	return std::move(aligned->m_Alignment);
-}
-
 void VRetargetSetupCore::RemoveTarget(int i_TargetIndex)
 {
 	constexpr const char* c_Command = "RemoveTarget";
@@ -243,7 +223,8 @@ void VRetargetSetupCore::RemoveTarget(int i_TargetIndex)
 		return CommandIgnored(c_Command, Ignored::c_NoSelectedTarget);
 	RetargetSetup::RemoveTarget(subject, applicationData, std::uint32_t(i_TargetIndex));
 	VIdentities identities = m_Target.m_Identities;
-	const VStep step(*this, {Steps::c_RemoveTarget});
+	const VStep step(
+	    *this, RetargetSetup::EditAs(Steps::c_RemoveTarget, "remove-target", std::to_string(i_TargetIndex)));
 	identities.m_Targets.erase(identities.m_Targets.begin() + i_TargetIndex);
 	ReplaceTarget(c_Command, std::move(subject),
 	    std::make_shared<const VSubjectApplicationData>(std::move(applicationData)), std::move(identities));
@@ -259,7 +240,7 @@ void VRetargetSetupCore::UpdateTargets()
 	const VSubjectValues& target = both->m_Target;
 	VSubjectParametrised subject = *target.m_pParametrised;
 	RetargetSetup::UpdateTargetStates(*both->m_pSourceFK, *both->m_pTargetFK, *source.m_pParametrised, subject);
-	const VStep step(*this, {Steps::c_UpdateTargets});
+	const VStep step(*this, RetargetSetup::EditAs(Steps::c_UpdateTargets, "update-targets"));
 	ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities);
 }
 
@@ -272,7 +253,7 @@ void VRetargetSetupCore::CreateAllJoints()
 	VSubjectParametrised subject = *target.m_pParametrised;
 	CoreOrlexQRTIO::VSubjectQRTExtras extras = GetTargetExtras();
 	RetargetSetup::EnableAllJoints(subject, extras);
-	const VStep step(*this, {Steps::c_CreateAllJoints});
+	const VStep step(*this, RetargetSetup::EditAs(Steps::c_CreateAllJoints, "create-joints"));
 	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities))
 		TakeExtras(std::move(extras));
 }
@@ -288,7 +269,7 @@ void VRetargetSetupCore::RemoveUnnecessaryJoints()
 	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
 	if (const auto pBefore = RetargetSetup::KinematicsInBindPose(*target.m_pParametrised, *target.m_pSubject, "target"))
 		TellChangedPose(*pBefore, subject);
-	const VStep step(*this, {Steps::c_RemoveJoints});
+	const VStep step(*this, RetargetSetup::EditAs(Steps::c_RemoveJoints, "prune-joints"));
 	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities))
 		TakeExtras(std::move(extras));
 }

@@ -22,6 +22,8 @@ struct VAlignmentChoice
 	bool m_bOthers = true;
 	/// Whether feet lean as the shins do.
 	bool m_bFeetWithShins = false;
+	/// The document begins with no other pose than the one that stands there.
+	bool m_bAsItStands = false;
 	/// Segments of the target whose joints stay as they are.
 	std::set<std::size_t> m_Locked;
 };

@@ -16,6 +16,7 @@ inline constexpr const char* c_UpdateTargets = "Update Targets";
 inline constexpr const char* c_CreateAllJoints = "Create All Joints";
 inline constexpr const char* c_RemoveJoints = "Remove Unnecessary Joints";
 inline constexpr const char* c_MatchFilePose = "Take Pose from FBX";
+inline constexpr const char* c_Rebind = "Re-bind";
 inline constexpr const char* c_Scale = "Change Scale";
 inline constexpr const char* c_ScaleRootHeight = "Scale Root Height";
 inline constexpr const char* c_Weight = "Change Weight";

@@ -58,6 +58,8 @@ struct VTargetFile
 	VSubjectValues m_Made;
 };
 
+struct VSessionStep;
+
 /// All of the document that an edit of the target subject may change. A copy shares the values with it.
 struct VTargetState
 {
@@ -73,6 +75,8 @@ struct VTargetState
 	/// Of the next subject that is made.
 	double m_NextScale = 1.0;
 	bool m_bScaleRootHeight = false;
+	/// What led here; null without a target subject, and where no history is kept.
+	std::shared_ptr<VSessionStep> m_pSteps;
 
 	// Of a state that others have taken the place of.
 

@@ -70,6 +70,12 @@ void VRetargetSetup::SaveTargetSubjectURL(const QUrl& i_rFileURL)
 		emit targetSubjectSaved(i_rFileURL);
 }
 
+bool VRetargetSetup::SaveRecipeURL(const QUrl& i_rFileURL)
+{
+	const boost::filesystem::path path = LocalPath("SaveRecipe", i_rFileURL);
+	return !path.empty() && SaveSessionRecipe(path);
+}
+
 bool VRetargetSetup::WriteCopyURL(const QUrl& i_rFileURL) const
 {
 	std::string reason;

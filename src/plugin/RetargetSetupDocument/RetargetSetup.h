@@ -52,21 +52,39 @@ public:
 	// "present" for a pair that has them.
 
 	/// Lists of maps: "pairs", "alternatives", "unmapped" of the source with "reason"; and "findings", sentences on how
-	/// the two stand. Empty if nothing can be proposed, which commandIgnored tells.
+	/// the two stand; and "noBody", why nothing is proposed where one of the two is no body. Empty if nothing can be
+	/// proposed, which commandIgnored tells.
 	Q_INVOKABLE QVariantMap ProposeTargets(double i_LeastScore);
+	/// The pairs of a preset as they fit these two, by names and by what is proposed: as ProposeTargets gives pairs,
+	/// "score" left out, with "misfits", sentences on pairs that do not fit, in place of findings. Empty if there are
+	/// none, which commandIgnored tells.
+	Q_INVOKABLE QVariantMap FitPreset(const QUrl& i_rFileURL, double i_LeastScore);
+	/// The pairs of the target subject. False, with the reason told by commandIgnored, if it could not be written.
+	Q_INVOKABLE bool SavePresetURL(const QUrl& i_rFileURL);
 	/// @param i_rTargets maps of "source", "target", "position" (else it is one of rotation) and "weight".
 	Q_INVOKABLE void AddTargets(const QVariantList& i_rTargets);
 
 	/// Brings the target subject to the pose of the source, beginning anew with the pose that stood there before the
 	/// first of several calls; all of them are one step.
 	/// @param i_rChains which are wanted: spine, arms, legs, others.
+	/// @param i_rLocked segments of the target subject whose joints stay.
 	/// @return "joints", a list of maps: "target", "source", "before", "after" in degrees, "note"; "turn" in degrees,
 	/// "lift" in mm, "refused", a list of sentences. Empty if there is no change, which commandIgnored tells.
-	Q_INVOKABLE QVariantMap AlignToSource(const QVariantList& i_rChains);
+	Q_INVOKABLE QVariantMap AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked);
 	/// What it has made is still there.
 	Q_INVOKABLE bool IsAligning() const;
 	/// @param i_bKeep false: the pose before it comes back, unless the target subject has become another one since.
 	Q_INVOKABLE void EndAlignment(bool i_bKeep);
+
+	/// What would become of the target subject with the FBX file that was read last, or with the source as another
+	/// performer.
+	/// @return "refusal", a sentence, or "lost", "changed" and "added", lists of sentences and names, "renamed", a list
+	/// of sentences on what was found under another name, and "kept", how many were found under their own. Empty if all
+	/// is as it was, or there are no two to hold against each other.
+	Q_INVOKABLE QVariantMap LookAtRebind(bool i_bPerformer) const;
+	/// Does it, in one step.
+	/// @param i_bMeasure measures the offsets of all targets anew, too.
+	Q_INVOKABLE void Rebind(bool i_bPerformer, bool i_bMeasure);
 
 	// For a host that offers Undo and Redo.
 
@@ -75,6 +93,11 @@ public:
 	Q_INVOKABLE QString UndoName() const { return QString::fromStdString(VRetargetSetupCore::UndoName()); }
 	Q_INVOKABLE QString RedoName() const { return QString::fromStdString(VRetargetSetupCore::RedoName()); }
 	Q_INVOKABLE void EndStep() { VRetargetSetupCore::EndStep(); }
+
+	/// A command line for a shell; empty, which commandIgnored tells, if there is none.
+	Q_INVOKABLE QString SessionCommands() { return QString::fromStdString(VRetargetSetupCore::SessionCommands()); }
+	/// False, with the reason told by commandIgnored, if it could not be written.
+	Q_INVOKABLE bool SaveRecipeURL(const QUrl& i_rFileURL);
 
 	/// For a host that keeps what is unsaved. False, with the reason told in the log, if it could not be written.
 	Q_INVOKABLE bool WriteCopyURL(const QUrl& i_rFileURL) const;
@@ -104,6 +127,10 @@ signals:
 
 	/// After CreateTargetSubject.
 	void targetSubjectCreated();
+
+	/// Another program has written the FBX file anew, and it was read again with other bones; or another source was
+	/// chosen.
+	void rebindCalledFor(bool i_bPerformer);
 
 	/// After Undo and Redo.
 	/// @param i_rFileURL of the target subject that is there now; empty if it is of no file.

@@ -1,5 +1,6 @@
 // What VRetargetSetup hands out of proposals, as values that a host knows without our types.
 
+#include "RetargetSetupCore/Presets.h"
 #include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/StepNames.h"
@@ -8,21 +9,30 @@
 
 #include <QStringList>
 
+#include <optional>
+#include <set>
+
 using CoreOrlexTypes::VSubjectParametrised;
 
 namespace
 {
 
-QVariantMap ToMap(const SetupProposal::VProposedPair& i_rPair, const VSubjectParametrised& i_rSource,
-    const VSubjectParametrised& i_rTarget)
+/// Both subjects, and what is asked of them.
+struct VBoth
+{
+	const VSubjectParametrised& m_rSource;
+	const VSubjectParametrised& m_rTarget;
+};
+
+QVariantMap ToMap(const SetupProposal::VProposedPair& i_rPair, const VBoth& i_rBoth)
 {
 	QStringList reasons;
 	for (const std::string& rReason : i_rPair.m_Reasons)
 		reasons << QString::fromStdString(rReason);
 	const auto isThere = [&](bool i_bPosition)
 	{
-		return RetargetSetup::FindTargetPair(
-		           i_rTarget, i_rSource.m_Segments[i_rPair.m_Source].m_Name, i_rPair.m_Target, i_bPosition)
+		return RetargetSetup::FindTargetPair(i_rBoth.m_rTarget, i_rBoth.m_rSource.m_Segments[i_rPair.m_Source].m_Name,
+		           i_rPair.m_Target, i_bPosition)
 		    != -1;
 	};
 	const bool bPresent =
@@ -30,6 +40,32 @@ QVariantMap ToMap(const SetupProposal::VProposedPair& i_rPair, const VSubjectPar
 	return {{"source", int(i_rPair.m_Source)}, {"target", int(i_rPair.m_Target)}, {"score", i_rPair.m_Score},
 	    {"reasons", reasons.join(QStringLiteral("; "))}, {"position", i_rPair.m_PositionWeight},
 	    {"rotation", i_rPair.m_RotationWeight}, {"present", bPresent}};
+}
+
+QVariantList ToList(const std::vector<SetupProposal::VProposedPair>& i_rPairs, const VBoth& i_rBoth)
+{
+	QVariantList list;
+	for (const SetupProposal::VProposedPair& rPair : i_rPairs)
+		list << ToMap(rPair, i_rBoth);
+	return list;
+}
+
+QVariantMap ToMap(const RetargetSetup::VFittedPair& i_rFitted, const VBoth& i_rBoth)
+{
+	const SetupIO::VPair& rPair = i_rFitted.m_Pair;
+	SetupProposal::VProposedPair pair;
+	pair.m_Source = i_rFitted.m_Source;
+	pair.m_Target = i_rFitted.m_Target;
+	pair.m_PositionWeight = rPair.m_Position.value_or(0.0);
+	pair.m_RotationWeight = rPair.m_Rotation.value_or(rPair.m_Position ? 0.0 : 1.0);
+	pair.m_Reasons.push_back(i_rFitted.m_bProposed
+	        ? "in the preset \"" + rPair.m_Source + "\" and \"" + rPair.m_Target + "\", here what is proposed for them"
+	        : "by names in the preset");
+	if (!rPair.m_Comment.empty())
+		pair.m_Reasons.push_back(rPair.m_Comment);
+	QVariantMap map = ToMap(pair, i_rBoth);
+	map.remove("score");
+	return map;
 }
 
 } // namespace
@@ -41,13 +77,7 @@ QVariantMap VRetargetSetup::ProposeTargets(double i_LeastScore)
 		return {};
 	const VSubjectValues source = SourceValues();
 	const VSubjectValues target = TargetValues();
-	const auto toList = [&](const std::vector<SetupProposal::VProposedPair>& i_rPairs)
-	{
-		QVariantList list;
-		for (const SetupProposal::VProposedPair& rPair : i_rPairs)
-			list << ToMap(rPair, *source.m_pParametrised, *target.m_pParametrised);
-		return list;
-	};
+	const VBoth both{*source.m_pParametrised, *target.m_pParametrised};
 	QVariantList unmapped;
 	for (const SetupProposal::VUnmapped& rUnmapped : proposal->m_UnmappedSources)
 		unmapped << QVariantMap{
@@ -58,8 +88,60 @@ QVariantMap VRetargetSetup::ProposeTargets(double i_LeastScore)
 	        RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject), *proposal))
 		if (!rFinding.m_bFine)
 			findings << QString::fromStdString(rFinding.m_Message);
-	return {{"pairs", toList(proposal->m_Pairs)}, {"alternatives", toList(proposal->m_Alternatives)},
-	    {"unmapped", unmapped}, {"findings", findings}};
+	return {{"pairs", ToList(proposal->m_Pairs, both)}, {"alternatives", ToList(proposal->m_Alternatives, both)},
+	    {"unmapped", unmapped}, {"findings", findings}, {"noBody", QString::fromStdString(proposal->m_NoBody)}};
+}
+
+QVariantMap VRetargetSetup::FitPreset(const QUrl& i_rFileURL, double i_LeastScore)
+{
+	constexpr const char* c_Command = "FitPreset";
+	const boost::filesystem::path path = LocalPath(c_Command, i_rFileURL);
+	const auto proposal = path.empty() ? std::nullopt : VRetargetSetupCore::ProposeTargets(i_LeastScore);
+	if (!proposal)
+		return {};
+	std::string reason;
+	const auto pairs = RetargetSetup::ReadPreset(path, reason);
+	if (!pairs)
+	{
+		CommandIgnored(c_Command, reason);
+		return {};
+	}
+	const VSubjectValues source = SourceValues();
+	const VSubjectValues target = TargetValues();
+	const VBoth both{*source.m_pParametrised, *target.m_pParametrised};
+	const RetargetSetup::VPresetFit fit = RetargetSetup::FitPreset(*pairs, both.m_rSource, both.m_rTarget, &*proposal);
+	QVariantList fitted;
+	std::set<std::size_t> used;
+	for (const RetargetSetup::VFittedPair& rPair : fit.m_Fitted)
+	{
+		fitted << ToMap(rPair, both);
+		used.insert(rPair.m_Source);
+	}
+	QVariantList unmapped;
+	for (std::size_t i = 0; i < both.m_rSource.m_Segments.size(); ++i)
+		if (!used.contains(i))
+			unmapped << QVariantMap{{"source", int(i)}, {"reason", QStringLiteral("not in the preset")}};
+	QStringList misfits;
+	for (const RetargetSetup::VMisfit& rMisfit : fit.m_Misfits)
+		misfits << QStringLiteral("\"%1\" and \"%2\": %3")
+		               .arg(QString::fromStdString(rMisfit.m_Pair.m_Source),
+		                   QString::fromStdString(rMisfit.m_Pair.m_Target), QString::fromStdString(rMisfit.m_Reason));
+	return {{"pairs", fitted},
+	    {"alternatives", ToList(proposal->m_Pairs, both) + ToList(proposal->m_Alternatives, both)},
+	    {"unmapped", unmapped}, {"misfits", misfits}};
+}
+
+bool VRetargetSetup::SavePresetURL(const QUrl& i_rFileURL)
+{
+	constexpr const char* c_Command = "SavePreset";
+	const boost::filesystem::path path = LocalPath(c_Command, i_rFileURL);
+	std::string reason;
+	if (path.empty())
+		return false;
+	if (VRetargetSetupCore::SavePreset(path, reason))
+		return true;
+	CommandIgnored(c_Command, reason);
+	return false;
 }
 
 void VRetargetSetup::AddTargets(const QVariantList& i_rTargets)
@@ -80,7 +162,7 @@ bool VRetargetSetup::IsAligning() const
 	return m_pAligned && TargetValues().m_pParametrised == m_pAligned;
 }
 
-QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains)
+QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked)
 {
 	if (IsAligning())
 		SetTargetSubjectParametrised(*m_pBeforeAlignment, {RetargetSetup::Steps::c_Align, m_Alignment});
@@ -95,6 +177,8 @@ QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains)
 	choice.m_bArms = i_rChains.value(1).toBool();
 	choice.m_bLegs = i_rChains.value(2).toBool();
 	choice.m_bOthers = i_rChains.value(3).toBool();
+	for (const QVariant& rSegment : i_rLocked)
+		choice.m_Locked.insert(std::size_t(rSegment.toInt()));
 	const auto alignment = VRetargetSetupCore::AlignToSource(choice, m_Alignment);
 	m_pAligned = TargetValues().m_pParametrised;
 	if (!alignment)
@@ -102,8 +186,7 @@ QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains)
 	const VSubjectValues source = SourceValues();
 	QVariantList joints;
 	for (const SetupProposal::VAlignedJoint& rJoint : alignment->m_Joints)
-		joints << QVariantMap{{"target", QString::fromStdString(m_pAligned->m_Segments[rJoint.m_Target].m_Name)},
-		    {"source", QString::fromStdString(source.m_pParametrised->m_Segments[rJoint.m_Source].m_Name)},
+		joints << QVariantMap{{"target", int(rJoint.m_Target)}, {"source", int(rJoint.m_Source)},
 		    {"before", rJoint.m_Before}, {"after", rJoint.m_After}, {"note", QString::fromStdString(rJoint.m_Note)}};
 	QVariantList refused;
 	for (const SetupProposal::VRefusedChain& rChain : alignment->m_Refused)

@@ -123,6 +123,8 @@ void VRetargetSetupWidget::OnSourceSkeletonChanged()
 			    "The skin '%1%' was chosen for source '%2%', and '%3%' wears it now", source.m_SkinName,
 			    RetargetSetup::FileStem(before->m_Path), RetargetSetup::FileStem(source.m_Path));
 		m_LoadedSource = source;
+		if (before && before->m_Path != source.m_Path)
+			emit m_pRetargetSetup->rebindCalledFor(true);
 		return;
 	}
 	m_UnreadSource = UtilsFileSystem::ToUtf8(path.filename());
@@ -186,7 +188,7 @@ void VRetargetSetupWidget::OnTargetFBXWritten()
 	NVX_LOG(c_LogCategory, changes.empty() ? NVX::ELogInformation : NVX::ELogWarning,
 	    "'%1%' has changed on disk and was read again: %2%", file,
 	    changes.empty() ? "its bones are as they were"
-	                    : changes + ". The target subject stays as it was until it is created again.");
+	                    : changes + ". The target subject stays as it was until it is created again or re-bound.");
 	std::uint32_t root = 0;
 	m_Parameters.m_pTargetRoot->Get(root);
 	m_Parameters.SetBones(RetargetSetup::BoneListForEnum(*pNow));
@@ -196,6 +198,9 @@ void VRetargetSetupWidget::OnTargetFBXWritten()
 	    : pNow->end();
 	m_Parameters.m_pTargetRoot->Set(found == pNow->end() ? std::uint32_t(0) : std::uint32_t(found - pNow->begin()));
 	OnTargetRootChanged();
+	const auto pData = m_pRetargetSetup->TargetValues().m_pApplicationData;
+	if (!changes.empty() && pData && pData->m_Skin == m_pRetargetSetup->GetTargetName())
+		emit m_pRetargetSetup->rebindCalledFor(false);
 }
 
 void VRetargetSetupWidget::OnTargetRootChanged()
