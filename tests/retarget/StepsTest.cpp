@@ -65,7 +65,7 @@ protected:
 			m_Kinds.insert(rEdit.begin().key());
 		std::string commands = m_Document.SessionCommands();
 		// Of what is in no file, no command can begin.
-		if (m_Folder.Read("recipe.json").find("recipe-begin.qrr") != std::string::npos && commands.empty())
+		if (m_Folder.Read("recipe.json").find("recipe-begin") != std::string::npos && commands.empty())
 			return;
 		ASSERT_TRUE(commands.starts_with("retarget "));
 		++m_Commands;

@@ -24,6 +24,7 @@ TEST(Options, WrongLines)
 	    {{"--log", "FBXIO=loud"}, "\"FBXIO=loud\" is not CATEGORY=LEVEL"},
 	    {{"--screenshot"}, "--screenshot"},
 	    {{"--frame", "3"}, "--take"},
+	    {{"--open", "recipe"}, "--open"},
 	};
 	for (const auto& [rArguments, pMessage] : rows)
 	{
@@ -45,8 +46,8 @@ TEST(Options, HelpAndVersionAreText)
 {
 	std::string text;
 	EXPECT_FALSE(ParseOptions({"--help"}, text));
-	for (const char* pOption : {"--source", "--fbx", "--target", "--take", "--frame", "--screenshot", "--size",
-	         "--module", "--settings", "--developer", "--version", "Exit status"})
+	for (const char* pOption : {"--source", "--fbx", "--target", "--take", "--frame", "--open", "--screenshot",
+	         "--size", "--module", "--settings", "--developer", "--version", "Exit status"})
 		EXPECT_NE(text.find(pOption), std::string::npos) << pOption;
 	EXPECT_FALSE(ParseOptions({"--version"}, text));
 	EXPECT_EQ(text, "retarget-studio " RETARGET_VERSION "\n");

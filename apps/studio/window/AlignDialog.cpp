@@ -16,7 +16,6 @@
 #include <QTableWidget>
 #include <QVBoxLayout>
 
-#include <cmath>
 #include <utility>
 
 namespace StudioHost
@@ -168,17 +167,20 @@ void VAlignDialog::ShowJoint(int i_Row, const QVariantMap& i_rJoint)
 
 void VAlignDialog::LockTicked()
 {
-	std::set<int> locked = m_Locked;
+	bool bChanged = false;
 	for (int row = 0; row < m_pTable->rowCount(); ++row)
 	{
 		const QTableWidgetItem& rLock = *m_pTable->item(row, EAlignLock);
 		const int segment = rLock.data(Qt::UserRole).toInt();
-		if (rLock.checkState() == Qt::Checked)
-			locked.insert(segment);
-		else
-			locked.erase(segment);
+		const bool bLocked = rLock.checkState() == Qt::Checked;
+		if (bLocked == m_Locked.contains(segment))
+			continue;
+		bLocked ? void(m_Locked.insert(segment)) : void(m_Locked.erase(segment));
+		bChanged = true;
+		// A press on a tick alone leaves the row that was chosen.
+		m_pTable->setCurrentCell(row, EAlignTarget);
 	}
-	if (std::exchange(m_Locked, locked) != locked)
+	if (bChanged)
 		Align();
 }
 

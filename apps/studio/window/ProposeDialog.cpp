@@ -114,7 +114,14 @@ VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::
 	connect(m_pLeastScore, qOverload<double>(&QDoubleSpinBox::valueChanged), this, &VProposeDialog::Fill);
 	connect(m_pOrigin, qOverload<int>(&QComboBox::activated), this, &VProposeDialog::ChooseOrigin);
 	connect(m_pTable, &QTableWidget::currentCellChanged, this, &VProposeDialog::SelectPair);
-	connect(m_pTable, &QTableWidget::itemChanged, this, &VProposeDialog::UpdateNote);
+	connect(m_pTable, &QTableWidget::itemChanged, this,
+	    [this](QTableWidgetItem* i_pItem)
+	    {
+		    // A press on a tick alone leaves the row that was chosen.
+		    if (i_pItem->column() == ESource)
+			    m_pTable->setCurrentItem(i_pItem);
+		    UpdateNote();
+	    });
 	connect(&m_rPanel, &VRetargetPanel::segmentsChanged, this,
 	    [this]
 	    {

@@ -183,14 +183,16 @@ bool VRetargetSetupCore::SaveSessionRecipe(const boost::filesystem::path& i_rPat
 			reason = errors.empty() ? std::string() : errors.front();
 		// Another file of the name stays.
 		boost::filesystem::path beginning = folder / (stem + "-begin.qrr");
-		for (int number = 2; exists(beginning) && RetargetSetup::DigestOf(beginning) != FileDigest::Sha256OfBytes(text);
+		boost::system::error_code error;
+		for (int number = 2; boost::filesystem::exists(beginning, error)
+		     && RetargetSetup::DigestOf(beginning) != FileDigest::Sha256OfBytes(text);
 		     ++number)
 			beginning = folder / (stem + "-begin-" + std::to_string(number) + ".qrr");
 		if (!bText || UtilsFileSystem::SaveFile(beginning, text, reason) != NVX::Status::c_Success)
 			return fail();
 		recipe->m_Subject = UtilsFileSystem::ToUtf8(beginning);
-		NVX_LOG(c_LogCategory, NVX::ELogInformation,
-		    "What the steps begin with is in no file any more, and is written to '%1%'", recipe->m_Subject);
+		NVX_LOG(c_LogCategory, NVX::ELogInformation, "What the steps begin with is written to '%1%', beside the recipe",
+		    recipe->m_Subject);
 	}
 	if (recipe->m_Output.empty())
 		recipe->m_Output = UtilsFileSystem::ToUtf8(folder / (stem + ".qrr"));
