@@ -3,6 +3,7 @@
 #include "../LogRecorder.h"
 #include "Rows.h"
 
+#include "InMemoryHost/Application.h"
 #include "InMemoryHost/PluginContext.h"
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
