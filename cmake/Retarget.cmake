@@ -8,6 +8,8 @@ set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)
 set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
 set(RETARGET_LIBRARY_DESTINATION ${CMAKE_INSTALL_LIBDIR}/RetargetSetup)
+# What is installed is for who runs the programs, but for what says "development".
+set(CMAKE_INSTALL_DEFAULT_COMPONENT_NAME programs)
 # Installed programs and the module find the shared library beside the static ones, wherever the tree is moved to.
 file(RELATIVE_PATH RETARGET_FROM_PROGRAMS /${CMAKE_INSTALL_BINDIR} /${RETARGET_LIBRARY_DESTINATION})
 set(CMAKE_INSTALL_RPATH $ORIGIN $ORIGIN/${RETARGET_FROM_PROGRAMS})
@@ -59,14 +61,32 @@ function(retarget_install name folder)
 	# Whoever links it compiles its headers.
 	target_compile_features(${name} PUBLIC cxx_std_20)
 	target_include_directories(${name} PUBLIC $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup>)
-	install(TARGETS ${name} EXPORT RetargetSetup ARCHIVE DESTINATION ${RETARGET_LIBRARY_DESTINATION}
-		LIBRARY DESTINATION ${RETARGET_LIBRARY_DESTINATION} RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
+	install(TARGETS ${name} EXPORT RetargetSetup
+		ARCHIVE DESTINATION ${RETARGET_LIBRARY_DESTINATION} COMPONENT development
+		LIBRARY DESTINATION ${RETARGET_LIBRARY_DESTINATION} NAMELINK_COMPONENT development
+		RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
 	if(ARGN STREQUAL "ALL")
 		return()
 	endif()
+	set_property(GLOBAL APPEND PROPERTY RETARGET_PUBLIC_FOLDERS ${folder})
+	foreach(header IN LISTS ARGN)
+		set_property(GLOBAL APPEND PROPERTY RETARGET_INTERNAL_HEADERS ${folder}/${header})
+	endforeach()
 	list(TRANSFORM ARGN REPLACE "(.+)" "PATTERN;\\1;EXCLUDE" OUTPUT_VARIABLE exclude)
-	install(DIRECTORY ${folder} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup FILES_MATCHING
-		PATTERN "*.h" ${exclude})
+	install(DIRECTORY ${folder} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/RetargetSetup COMPONENT development
+		FILES_MATCHING PATTERN "*.h" ${exclude})
+endfunction()
+
+# retarget_manual(PROGRAM ARGUMENTS...): installs the manual page that the program prints when it is run with these.
+find_program(RETARGET_GZIP gzip REQUIRED)
+function(retarget_manual program)
+	# What a program leaves behind in memory is looked for by its tests.
+	add_custom_command(OUTPUT ${program}.1.gz
+		COMMAND ${CMAKE_COMMAND} -E env ASAN_OPTIONS=detect_leaks=0 $<TARGET_FILE:${program}> ${ARGN} > ${program}.1
+		COMMAND ${RETARGET_GZIP} -9nf ${program}.1
+		DEPENDS ${program} VERBATIM)
+	add_custom_target(${program}_manual ALL DEPENDS ${program}.1.gz)
+	install(FILES ${CMAKE_CURRENT_BINARY_DIR}/${program}.1.gz DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
 endfunction()
 
 # retarget_screen(VARIABLE NAME SIZE): the command by which the test of this name gets a screen of its own.
@@ -119,14 +139,60 @@ function(retarget_long_test name seconds)
 	set_tests_properties(${name} PROPERTIES COST ${seconds})
 endfunction()
 
+# retarget_docs(): the target "docs", pages of the headers that are installed, in the build folder's docs/.
+function(retarget_docs)
+	find_program(RETARGET_DOXYGEN doxygen)
+	if(NOT RETARGET_DOXYGEN)
+		add_custom_target(docs COMMAND ${CMAKE_COMMAND} -E echo "The pages need Debian's package doxygen; then cmake again"
+			COMMAND ${CMAKE_COMMAND} -E false)
+		return()
+	endif()
+	get_property(folders GLOBAL PROPERTY RETARGET_PUBLIC_FOLDERS)
+	get_property(internal GLOBAL PROPERTY RETARGET_INTERNAL_HEADERS)
+	list(JOIN folders "\" \\\n\"" folders)
+	list(JOIN internal "\" \\\n\"" internal)
+	configure_file(${PROJECT_SOURCE_DIR}/cmake/Doxyfile.in ${PROJECT_BINARY_DIR}/Doxyfile @ONLY)
+	add_custom_target(docs COMMAND ${RETARGET_DOXYGEN} ${PROJECT_BINARY_DIR}/Doxyfile
+		COMMAND ${CMAKE_COMMAND} -E echo "The pages begin at ${PROJECT_BINARY_DIR}/docs/index.html" VERBATIM)
+endfunction()
+
+# retarget_pkg_config(NAME DESCRIPTION FLAGS REQUIRES LIBRARIES): a pkg-config file.
+function(retarget_pkg_config name description flags requires libraries)
+	file(RELATIVE_PATH to_prefix /x/${CMAKE_INSTALL_LIBDIR}/pkgconfig /x)
+	configure_file(${PROJECT_SOURCE_DIR}/cmake/retarget-setup.pc.in ${PROJECT_BINARY_DIR}/${name}.pc @ONLY)
+	install(FILES ${PROJECT_BINARY_DIR}/${name}.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig COMPONENT development)
+endfunction()
+
 # retarget_package(): the CMake package config of all that was installed, so that find_package(RetargetSetup) gives
-# RetargetSetup::<Library>.
+# RetargetSetup::<Library>, and the same for pkg-config: "retarget-setup", and "retarget-setup-qt" for what needs Qt.
 function(retarget_package)
 	set(folder ${CMAKE_INSTALL_LIBDIR}/cmake/RetargetSetup)
-	install(EXPORT RetargetSetup FILE RetargetSetupTargets.cmake NAMESPACE RetargetSetup:: DESTINATION ${folder})
+	install(EXPORT RetargetSetup FILE RetargetSetupTargets.cmake NAMESPACE RetargetSetup:: DESTINATION ${folder}
+		COMPONENT development)
 	write_basic_package_version_file(${PROJECT_BINARY_DIR}/RetargetSetupConfigVersion.cmake COMPATIBILITY SameMinorVersion)
 	configure_file(${PROJECT_SOURCE_DIR}/cmake/RetargetSetupConfig.cmake ${PROJECT_BINARY_DIR}/RetargetSetupConfig.cmake
 		@ONLY)
 	install(FILES ${PROJECT_BINARY_DIR}/RetargetSetupConfigVersion.cmake ${PROJECT_BINARY_DIR}/RetargetSetupConfig.cmake
-		DESTINATION ${folder})
+		DESTINATION ${folder} COMPONENT development)
+
+	foreach(folder IN LISTS RETARGET_LIBRARY_FOLDERS)
+		cmake_path(GET folder FILENAME library)
+		if(library STREQUAL "host")
+			set(library RetargetSetupHost)
+		elseif(library STREQUAL "TesselPluginRetargetSetup")
+			set(library RetargetSetupPanel)
+		endif()
+		if(folder IN_LIST RETARGET_QT_LIBRARY_FOLDERS)
+			string(PREPEND qt_libraries "-l${library} ")
+		else()
+			string(PREPEND libraries "-l${library} ")
+		endif()
+	endforeach()
+	set(system "-lboost_regex -lboost_filesystem -ldl -pthread")
+	retarget_pkg_config(retarget-setup "Subjects, skeleton and FBX files, kinematics" "-I\${includedir} -std=c++20"
+		"libdeflate nettle" "-L\${libdir} -Wl,-rpath,\${libdir} ${libraries}${system}")
+	if(RETARGET_QT)
+		retarget_pkg_config(retarget-setup-qt "The preview and the panel of retarget subjects" "" 
+			"retarget-setup libpng Qt5Widgets Qt5QuickWidgets Qt5Quick Qt5Qml Qt5Gui Qt5Core" "${qt_libraries}")
+	endif()
 endfunction()

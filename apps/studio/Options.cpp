@@ -2,6 +2,7 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/HelpFormatter.h"
+#include "CommandLineText/ManualPage.h"
 #include "CommandLineText/Parsing.h"
 #include "studio/panel/FileKind.h"
 #include "studio/window/StudioWindow.h"
@@ -57,7 +58,7 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	std::string module, settings, fbx, source, target, take, dialog, screenshot, size;
 	std::size_t frame = 0;
 	std::vector<std::string> files;
-	bool bDeveloper = false;
+	bool bDeveloper = false, bManual = false;
 
 	CLI::App app(c_pDescription, "retarget-studio");
 	app.formatter(std::make_shared<CommandLine::VHelpFormatter>());
@@ -85,6 +86,8 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	app.add_option("--settings", settings, "Keep settings in this file instead of the user's own")
 	    ->option_text("FILE.ini");
 	app.add_flag("--developer", bDeveloper, "QML comes from the sources; F5 loads it again");
+	// For the build: there is nothing else to ask than the program.
+	app.add_flag("--manual", bManual, "Print the manual page and exit")->group("");
 	CommandLine::AddMessageOptions(app, pMessages);
 	try
 	{
@@ -98,6 +101,13 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	catch (const CLI::CallForVersion&)
 	{
 		o_rText = app.version() + "\n";
+		return std::nullopt;
+	}
+
+	if (bManual)
+	{
+		o_rText =
+		    CommandLine::ManualPage(app, "tie a performer's skeleton to a character's in a window", RETARGET_VERSION);
 		return std::nullopt;
 	}
 

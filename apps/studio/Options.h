@@ -36,7 +36,7 @@ struct VOptions
 };
 
 /// Reads a command line, the program's own name left out. Throws CommandLine::VCommandError for one that is wrong.
-/// @param o_rText what is to be printed instead of a run: the help or the version.
+/// @param o_rText what is to be printed instead of a run: the help, the version or the manual page.
 /// @return nothing if there is something to print.
 std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::string& o_rText);
 

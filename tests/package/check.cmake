@@ -1,11 +1,27 @@
 # Installs the build into a folder of its own, builds the consumer against it, and runs it.
 set(prefix ${build}/package-test)
+set(consumer ${CMAKE_CURRENT_LIST_DIR}/consumer)
 file(REMOVE_RECURSE ${prefix})
+# The desktop's entry names the kinds of files that are declared beside it.
+function(check_kinds)
+	file(STRINGS ${prefix}/share/applications/retarget-studio.desktop kinds REGEX "^MimeType=")
+	file(READ ${prefix}/share/mime/packages/retarget-setup.xml declared)
+	string(REGEX MATCHALL "[a-z]+/[-a-z+]+" kinds "${kinds}")
+	foreach(kind IN LISTS kinds ITEMS application/x-retarget-subject+xml)
+		string(FIND "${declared}" "mime-type type=\"${kind}\"" at)
+		if(at LESS 0)
+			message(FATAL_ERROR "${kind} is declared nowhere")
+		endif()
+	endforeach()
+endfunction()
+
 foreach(command IN ITEMS
 	"${CMAKE_COMMAND};--install;${build};--prefix;${prefix}"
-	"${CMAKE_COMMAND};-G;Ninja;-S;${CMAKE_CURRENT_LIST_DIR}/consumer;-B;${prefix}/consumer;-DCMAKE_PREFIX_PATH=${prefix};-DCMAKE_CXX_COMPILER=${compiler}"
+	"${CMAKE_COMMAND};-G;Ninja;-S;${consumer};-B;${prefix}/consumer;-DCMAKE_PREFIX_PATH=${prefix};-DCMAKE_CXX_COMPILER=${compiler}"
 	"${CMAKE_COMMAND};--build;${prefix}/consumer"
 	"${prefix}/consumer/consumer;${CMAKE_CURRENT_LIST_DIR}/../../demo/character.fbx"
+	"sh;-c;exec ${compiler} ${consumer}/main.cpp -o ${prefix}/by-pkg-config $(PKG_CONFIG_PATH=${prefix}/lib/pkgconfig pkg-config --cflags --libs retarget-setup)"
+	"${prefix}/by-pkg-config;${CMAKE_CURRENT_LIST_DIR}/../../demo/character.fbx"
 	"${prefix}/bin/retarget;--version"
 	"${prefix}/bin/retarget-studio;--version")
 	execute_process(COMMAND ${command} RESULT_VARIABLE result OUTPUT_VARIABLE output ERROR_VARIABLE output)
@@ -13,3 +29,4 @@ foreach(command IN ITEMS
 		message(FATAL_ERROR "${command}:\n${output}")
 	endif()
 endforeach()
+check_kinds()

@@ -51,6 +51,10 @@ TEST(Options, HelpAndVersionAreText)
 		EXPECT_NE(text.find(pOption), std::string::npos) << pOption;
 	EXPECT_FALSE(ParseOptions({"--version"}, text));
 	EXPECT_EQ(text, "retarget-studio " RETARGET_VERSION "\n");
+	EXPECT_FALSE(ParseOptions({"--manual"}, text));
+	for (const char* pText : {".TH RETARGET\\-STUDIO 1 ", "\\-\\-screenshot OUT.png", ".B FILE", "Exit status"})
+		EXPECT_NE(text.find(pText), std::string::npos) << pText;
+	EXPECT_EQ(text.find("manual"), std::string::npos) << "a hidden option";
 }
 
 TEST(Options, FilesInTheOrderOfTheirKinds)

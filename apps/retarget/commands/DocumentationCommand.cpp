@@ -1,3 +1,4 @@
+#include "CommandLineText/ManualPage.h"
 #include "CommandLineText/Parsing.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/text/Documentation.h"
@@ -21,7 +22,7 @@ VCommand AddDocumentationCommand(CLI::App& io_rProgram)
 	    [pForm]
 	    {
 		    if (*pForm == "man")
-			    Print(ManualPage(*MakeProgram().m_pApp));
+			    Print(ManualPage(*MakeProgram().m_pApp, "build and edit retarget subjects", RETARGET_VERSION));
 		    else
 			    Print(*pForm == "bash" ? BashCompletion() : *pForm == "zsh" ? ZshCompletion() : FishCompletion());
 		    return EFine;

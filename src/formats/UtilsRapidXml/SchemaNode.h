@@ -28,8 +28,8 @@ public:
 	};
 
 	/// Writes what stands before the elements.
-	/// @param i_SchemaNamespace of the version annotations.
-	/// @param i_Stylesheet file name, used with i_bStylesheet only.
+	/// @param i_rSchemaNamespace of the version annotations.
+	/// @param i_rStylesheet file name, used with i_bStylesheet only.
 	VSchemaNode(VDocument& i_rDocument, bool i_bStylesheet, const std::string& i_rSchemaNamespace,
 	    const std::string& i_rStylesheet);
 	/// Puts the attributes behind the content model, where the schema language wants them.

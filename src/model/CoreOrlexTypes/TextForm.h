@@ -14,9 +14,9 @@
 /// A record is "[" all values in declared order, separated by ",", "]", or "{" pairs of a quoted key, ":" and a value,
 /// separated by ",", "}". In the second spelling unknown keys are ignored, of equal keys the first counts and a missing
 /// key leaves its field as it was. Lists are "[" values "]", colours the list of their four numbers, texts are quoted
-/// with the escapes \n and \r and a backslash before any other byte that is meant literally; \t stands for two bytes,
-/// the tab and the letter t. Enumerations are quoted enumerator names, booleans 0, 1, false or true. The bytes 9, 10,
-/// 13 and 32 may stand before every token, and a zero byte ends the text.
+/// with the escapes `\n` and `\r` and a backslash before any other byte that is meant literally; `\t` stands for two
+/// bytes, the tab and the letter t. Enumerations are quoted enumerator names, booleans 0, 1, false or true. The bytes
+/// 9, 10, 13 and 32 may stand before every token, and a zero byte ends the text.
 namespace CoreOrlexTypes
 {
 

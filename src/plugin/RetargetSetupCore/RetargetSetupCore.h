@@ -297,7 +297,7 @@ protected:
 	virtual void UnsavedChangesChanged() {}
 	/// After Undo and Redo.
 	/// @param i_rFile that the target subject is of now, empty for none.
-	virtual void TargetSubjectBroughtBack(const boost::filesystem::path& /*i_rFile*/) {}
+	virtual void TargetSubjectBroughtBack([[maybe_unused]] const boost::filesystem::path& i_rFile) {}
 	/// After CreateTargetSubject.
 	virtual void TargetSubjectCreated() {}
 	/// AddTarget has found the target that it was to add.
@@ -305,7 +305,9 @@ protected:
 	/// A command has ended with no change.
 	/// @param i_pCommand its name.
 	/// @param i_rReason a sentence for the operator: what was missing, or what failed.
-	virtual void CommandIgnored(const char* /*i_pCommand*/, const std::string& /*i_rReason*/) {}
+	virtual void CommandIgnored([[maybe_unused]] const char* i_pCommand, [[maybe_unused]] const std::string& i_rReason)
+	{
+	}
 
 private:
 	using VSubjectItems = RetargetSetup::VSubjectItems;

@@ -39,7 +39,7 @@ class VRenderManipulator : public IRenderType, public IManipulator
 public:
 	/// With the context current, while the user interface thread waits. Without the ring's mesh there are no rings, and
 	/// the log says so.
-	/// @param i_rpRegistry of the scene
+	/// @param i_pRegistry of the scene
 	VRenderManipulator(CoreGraphics::VShaderLibrary& io_rLibrary, std::shared_ptr<VSelectionRegistry> i_pRegistry,
 	    std::shared_ptr<TesselPluginInterface::ISelectionManager> i_pSelectionManager);
 	~VRenderManipulator() override;
