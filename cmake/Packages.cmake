@@ -27,6 +27,8 @@ foreach(component programs development)
 endforeach()
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/demo DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/retarget-setup/examples
 	COMPONENT programs FILES_MATCHING REGEX "\\.(bvh|fbx|json|qrs)$")
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/examples/batch DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/retarget-setup/examples
+	COMPONENT programs PATTERN make_example.py EXCLUDE PATTERN __pycache__ EXCLUDE)
 
 # What is loaded at run time is not seen by dpkg-shlibdeps: LAPACK, and the toolkit's QML modules.
 set(loaded liblapacke)
@@ -37,7 +39,7 @@ if(RETARGET_QT)
 	string(REGEX MATCHALL "qml-module-[a-z0-9-]+" modules "${modules}")
 	list(APPEND loaded ${modules})
 	list(APPEND headers libpng-dev qtbase5-dev qtdeclarative5-dev)
-	set(CPACK_DEBIAN_PROGRAMS_PACKAGE_SUGGESTS "xvfb, xauth")
+	set(CPACK_DEBIAN_PROGRAMS_PACKAGE_SUGGESTS "snakemake, xvfb, xauth")
 	set(window ",\nthe studio in a window with a preview")
 endif()
 list(JOIN loaded ", " CPACK_DEBIAN_PROGRAMS_PACKAGE_DEPENDS)

@@ -6,8 +6,12 @@
 #include <nlohmann/json.hpp>
 
 #include <algorithm>
+#include <atomic>
+#include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <cstring>
+#include <fcntl.h>
 #include <mutex>
 #include <string_view>
 #include <unistd.h>
@@ -80,6 +84,23 @@ constexpr std::size_t c_MaximumHeld = 10000;
 /// So many warnings tell the reason of an error.
 constexpr std::size_t c_MaximumReasons = 10;
 
+/// Of the file that messages are appended to; -1 for none.
+std::atomic<int>& LogDescriptor()
+{
+	static std::atomic<int> s_Descriptor{-1};
+	return s_Descriptor;
+}
+
+/// In one piece, so that the lines of several processes do not mix.
+void Keep(const std::string& i_rLine)
+{
+	const int descriptor = LogDescriptor();
+	if (descriptor < 0 || write(descriptor, i_rLine.data(), i_rLine.size()) == ssize_t(i_rLine.size()))
+		return;
+	LogDescriptor() = -1;
+	std::fprintf(stderr, "warning %s: The log file is not complete: %s\n", c_pCategory, std::strerror(errno));
+}
+
 void Show(const VMessageSettings& i_rSettings, const VMessage& i_rMessage, EExitStatus i_Status = EFine)
 {
 	if (!i_rSettings.m_bJson)
@@ -88,7 +109,9 @@ void Show(const VMessageSettings& i_rSettings, const VMessage& i_rMessage, EExit
 	    {"text", OneLine(i_rMessage.m_Text)}};
 	if (i_Status != EFine)
 		json["status"] = int(i_Status);
-	std::fprintf(stderr, "%s\n", json.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace).c_str());
+	const std::string line = json.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace) + "\n";
+	std::fputs(line.c_str(), stderr);
+	Keep(line);
 }
 
 void Deliver(VInbox& io_rInbox, const VMessage& i_rMessage, EExitStatus i_Status = EFine)
@@ -179,8 +202,21 @@ void PrintMessage(const NVX::VLogCategory& i_rCategory, int i_Level, const std::
 {
 	static const bool s_bColour = HasColours(STDERR_FILENO);
 	const VLevel& rLevel = LevelOf(i_Level);
-	std::fprintf(stderr, "%s%s%s %s: %s\n", s_bColour ? rLevel.m_pColour : "", rLevel.m_pName,
-	    s_bColour ? "\033[0m" : "", i_rCategory.Name().c_str(), OneLine(i_rMessage).c_str());
+	const std::string text = " " + i_rCategory.Name() + ": " + OneLine(i_rMessage) + "\n";
+	std::fprintf(stderr, "%s%s%s%s", s_bColour ? rLevel.m_pColour : "", rLevel.m_pName, s_bColour ? "\033[0m" : "",
+	    text.c_str());
+	Keep(rLevel.m_pName + text);
+}
+
+void KeepMessages(const std::string& i_rFile)
+{
+	if (!i_rFile.ends_with(".log"))
+		throw VCommandError(EWrongUsage, "--log-file: \"" + i_rFile + "\" does not end in .log");
+	const int descriptor = open(i_rFile.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0666);
+	if (descriptor < 0)
+		throw VCommandError(EBadOutput, "\"" + i_rFile + "\" cannot be written: " + std::strerror(errno));
+	if (const int before = LogDescriptor().exchange(descriptor); before >= 0)
+		close(before);
 }
 
 std::string ParseCategoryLevel(const std::string& i_rText, VMessageSettings& io_rSettings)

@@ -26,6 +26,8 @@ struct VMessageSettings
 	bool m_bJson = false;
 	/// Warnings are errors.
 	bool m_bStrict = false;
+	/// Where messages are kept besides; empty for nowhere.
+	std::string m_LogFile;
 };
 
 /// All that messages of this system may have, so that a slip of the hand is told.
@@ -56,6 +58,10 @@ std::string OneLine(std::string i_Message);
 /// Prints a message on standard error, one line, as "level category: text"; coloured on a terminal unless NO_COLOR is
 /// set.
 void PrintMessage(const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage);
+
+/// From here on each message that is printed is appended to a file, too, without colours; any number of processes may
+/// append to one. Throws VCommandError for a file that cannot be written or has no name of a log's.
+void KeepMessages(const std::string& i_rFile);
 
 /// Sends the log to standard error as these settings have it. Lasts as long as the result. Where only errors are shown,
 /// an error brings the warnings of its category that came right before it: they tell its reason.

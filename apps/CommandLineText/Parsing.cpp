@@ -144,6 +144,14 @@ void AddMessageOptions(CLI::App& io_rApp, const std::shared_ptr<VMessageSettings
 	    ->option_text("CATEGORY=LEVEL")
 	    ->trigger_on_parse()
 	    ->group("Messages");
+	io_rApp
+	    .add_option_function<std::string>(
+	        "--log-file", [i_rpSettings](const std::string& i_rText) { i_rpSettings->m_LogFile = i_rText; },
+	        "Append the messages to this file, too, a line each; any number of processes may share it")
+	    ->option_text("FILE.log")
+	    ->check(NotEmpty())
+	    ->trigger_on_parse()
+	    ->group("Messages");
 }
 
 void Parse(CLI::App& io_rProgram, std::vector<std::string> i_Arguments)

@@ -168,6 +168,8 @@ int Run(std::vector<std::string> i_Arguments, const VRender& i_rRender)
 		}
 		pMessages.reset();
 		pMessages = ShowMessages(*program.m_pMessages);
+		if (!program.m_pMessages->m_LogFile.empty())
+			KeepMessages(program.m_pMessages->m_LogFile);
 		HoldMessages();
 		const EExitStatus status = RunParsed(program);
 		if (status == EFine)

@@ -152,6 +152,8 @@ int Run(int i_Count, char** i_ppArguments)
 		}
 		pMessages.reset();
 		pMessages = ShowMessagesOnTerminal(options->m_Messages);
+		if (!options->m_Messages.m_LogFile.empty())
+			CommandLine::KeepMessages(options->m_Messages.m_LogFile);
 		CommandLine::PrepareDisplay({c_pCategory, EBadInput,
 		    "There is no display to show a window on: set DISPLAY, or use the program retarget"});
 		QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts);

@@ -3,9 +3,11 @@
 #include "retarget/text/Completion.h"
 
 #include <boost/algorithm/string/replace.hpp>
+#include <boost/algorithm/string/split.hpp>
 
 #include <algorithm>
 #include <cstdlib>
+#include <future>
 #include <sstream>
 #include <sys/wait.h>
 
@@ -50,6 +52,10 @@ TEST(Usage, WrongWords)
 	    {"level behind -v", {"-v", "QRTIO=none", "schema"}, 2, "", "--log: \"QRTIO=none\" is not CATEGORY=LEVEL"},
 	    {"category", {"schema", "--log", "QRTI=error"}, 2, "",
 	        "there is no category \"QRTI\"; did you mean \"QRTIO\"?; the categories are Command, CoreGraphics, "},
+	    {"log file", {"schema", "--log-file", "x.qrr"}, 2, "", "--log-file: \"x.qrr\" does not end in .log"},
+	    {"log file without a name", {"schema", "--log-file="}, 2, "", "--log-file"},
+	    {"log file in no folder", {"schema", "--log-file", "none/x.log"}, 4, "",
+	        "\"none/x.log\" cannot be written: No such file or directory"},
 	    {"report and file", {"schema", "--json"}, 2, "",
 	        R"({"level":"error","category":"retarget","text":"--json reports on standard output, where -o - puts the )"},
 	    {"context", {"eval", "1", "--context", "cubic"}, 2, "",
@@ -192,6 +198,32 @@ TEST(Usage, LevelsOfMessages)
 	EXPECT_NE(messages({"-v"}).find("information FBXIO: Loading file"), std::string::npos);
 	EXPECT_EQ(messages({"-v", "RetargetSetup=error"}), "");
 	EXPECT_EQ(messages({"--log=RetargetSetup=error", "-v"}).rfind("information FBXIO", 0), 0u);
+}
+
+TEST(Usage, ManyAtOnceDoNotMeet)
+{
+	const VScratchFolder folder;
+	const auto make = [&](std::size_t i_Index)
+	{
+		return folder.Run({"create", "--fbx", Data("fbx/kenney_medium_b7400.fbx"), "-v", "--log-file", "all.log", "-o",
+		    std::to_string(i_Index) + ".qrr"});
+	};
+	std::vector<std::future<VRun>> runs;
+	for (std::size_t i = 0; i < 8; ++i)
+		runs.push_back(std::async(std::launch::async, make, i));
+	std::vector<std::string> told, lines;
+	for (std::size_t i = 0; i < runs.size(); ++i)
+	{
+		const VRun run = runs[i].get();
+		EXPECT_EQ(run.m_Status, 0) << run.m_Err;
+		boost::split(lines, run.m_Err, [](char i_Byte) { return i_Byte == '\n'; });
+		told.insert(told.end(), lines.begin(), lines.end() - 1);
+		EXPECT_EQ(folder.Read(std::to_string(i) + ".qrr"), folder.Read("0.qrr"));
+	}
+	boost::split(lines, folder.Read("all.log"), [](char i_Byte) { return i_Byte == '\n'; });
+	lines.pop_back();
+	EXPECT_GE(lines.size(), 16u);
+	EXPECT_TRUE(std::ranges::is_permutation(lines, told)) << folder.Read("all.log");
 }
 
 TEST(Usage, WarningsAreErrorsWhereAsked)

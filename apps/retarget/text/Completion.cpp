@@ -253,6 +253,7 @@ constexpr VValue c_Values[] = {
     {"FILE...", Files},
     {"FILE.fbx", Files},
     {"FILE.json", Files},
+    {"FILE.log", Files},
     {"FILE.qrr", Files},
     {"FILE.qrs", Files},
     {"FIRST:LAST", Nothing},
