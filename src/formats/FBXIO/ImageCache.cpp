@@ -8,6 +8,7 @@
 #include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
+#include <locale>
 
 namespace
 {

@@ -1,9 +1,13 @@
 #include "DebugServices/GlobalLog.h"
 
+#include <boost/format.hpp>
+
 #include <condition_variable>
 #include <cstddef>
 #include <cstdio>
+#include <exception>
 #include <list>
+#include <locale>
 #include <map>
 #include <mutex>
 #include <vector>
@@ -124,4 +128,23 @@ void LoggingDetail::GlobalLogStream(const NVX::VLogCategory& i_rCategory, int i_
 			pSink->m_Call(i_rCategory, i_Level, i_rMessage);
 	if (sinks.empty())
 		std::fprintf(stderr, "%d %s: %s\n", i_Level, i_rCategory.Name().c_str(), i_rMessage.c_str());
+}
+
+void LoggingDetail::Log(const NVX::VLogCategory& i_rCategory, int i_Level, const char* i_pFormat,
+    std::initializer_list<VArgument> i_Arguments)
+{
+	std::string message;
+	try
+	{
+		boost::format format(i_pFormat, std::locale::classic());
+		for (const VArgument& rArgument : i_Arguments)
+			std::visit([&format](const auto& i_rValue) { format % i_rValue; }, rArgument.Value());
+		message = format.str();
+	}
+	catch (const std::exception&)
+	{
+		i_Level = NVX::ELogError;
+		message = std::string("Cannot Format Log Message \"") + i_pFormat + "\"";
+	}
+	GlobalLogStream(i_rCategory, i_Level, message);
 }

@@ -1,12 +1,13 @@
 #pragma once
 
-#include <boost/format.hpp>
-
 #include <atomic>
 #include <functional>
-#include <locale>
+#include <initializer_list>
 #include <memory>
 #include <string>
+#include <string_view>
+#include <type_traits>
+#include <variant>
 
 namespace NVX
 {
@@ -60,24 +61,49 @@ namespace LoggingDetail
 /// Hands a finished message to the sinks.
 void GlobalLogStream(const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage);
 
-/// A message with %1%-style placeholders or printf directives. One that cannot be formatted is told as such at error
-/// level instead, so that logging never raises.
-template <typename... VArguments>
-void Log(const NVX::VLogCategory& i_rCategory, int i_Level, const char* i_pFormat, const VArguments&... i_rArguments)
+/// A number or text of a message; refers to the text that it is made of.
+class VArgument
 {
-	std::string message;
-	try
+public:
+	template <typename TNumber>
+	requires std::is_arithmetic_v<TNumber> || std::is_enum_v<TNumber> VArgument(TNumber i_Number)
+	    : m_Value(Widest(i_Number))
 	{
-		boost::format format(i_pFormat, std::locale::classic());
-		(void)(format % ... % i_rArguments);
-		message = format.str();
 	}
-	catch (const std::exception&)
+	template <typename TText>
+	requires std::is_convertible_v<const TText&, std::string_view> VArgument(const TText& i_rText)
+	    : m_Value(std::string_view(i_rText))
 	{
-		i_Level = NVX::ELogError;
-		message = std::string("Cannot Format Log Message \"") + i_pFormat + "\"";
 	}
-	GlobalLogStream(i_rCategory, i_Level, message);
+
+	const auto& Value() const { return m_Value; }
+
+private:
+	template <typename TNumber>
+	static auto Widest(TNumber i_Number)
+	{
+		if constexpr (std::is_floating_point_v<TNumber>)
+			return double(i_Number);
+		else if constexpr (std::is_same_v<TNumber, char>)
+			return i_Number;
+		else if constexpr (std::is_unsigned_v<TNumber>)
+			return static_cast<unsigned long long>(i_Number);
+		else
+			return static_cast<long long>(i_Number);
+	}
+
+	std::variant<long long, unsigned long long, double, char, std::string_view> m_Value;
+};
+
+/// Hands on a message with %1%-style placeholders or printf directives. One that cannot be formatted is told as such at
+/// error level instead, so that logging never raises.
+void Log(const NVX::VLogCategory& i_rCategory, int i_Level, const char* i_pFormat,
+    std::initializer_list<VArgument> i_Arguments);
+
+template <typename... TArguments>
+void Log(const NVX::VLogCategory& i_rCategory, int i_Level, const char* i_pFormat, const TArguments&... i_rArguments)
+{
+	Log(i_rCategory, i_Level, i_pFormat, {VArgument(i_rArguments)...});
 }
 
 } // namespace LoggingDetail
