@@ -2,11 +2,11 @@
 
 #include "CoreOrlexTypes/JointType.h"
 #include "CoreOrlexTypes/Subject.h"
-#include "numerics/fnl_symmetric_eigensystem.h"
+
+#include <Eigen/Eigenvalues>
 
 #include <algorithm>
 #include <cmath>
-#include <cstddef>
 #include <numbers>
 
 namespace ComputeSubject
@@ -27,17 +27,14 @@ constexpr double c_NarrowestRange = 1e-3;
 /// The inverse of a covariance-like matrix; eigenvalues that are too small are raised, or say nothing.
 VMatrix6 InverseOf(const std::vector<double>& i_rMatrix, std::size_t i_Size, double i_Smallest, bool i_bRaise)
 {
-	std::vector<double> vectors;
-	std::vector<double> values;
-	fnl_symmetric_eigensystem_compute(i_rMatrix, vectors, values);
+	const Eigen::MatrixXd matrix = Eigen::Map<const Eigen::MatrixXd>(i_rMatrix.data(), i_Size, i_Size);
+	const Eigen::SelfAdjointEigenSolver<Eigen::MatrixXd> eigen(matrix);
+	Eigen::VectorXd values = eigen.eigenvalues();
+	for (double& rValue : values)
+		rValue = rValue > i_Smallest ? 1.0 / rValue : i_bRaise ? 1.0 / i_Smallest : 0.0;
 	VMatrix6 inverse = VMatrix6::Zero();
-	for (std::size_t k = 0; k < i_Size; ++k)
-	{
-		VVector6 vector = VVector6::Zero();
-		std::copy_n(vectors.begin() + std::ptrdiff_t(k * i_Size), i_Size, vector.data());
-		const double value = values[k] > i_Smallest ? 1.0 / values[k] : i_bRaise ? 1.0 / i_Smallest : 0.0;
-		inverse += value * vector * vector.transpose();
-	}
+	inverse.topLeftCorner(i_Size, i_Size) =
+	    eigen.eigenvectors() * values.asDiagonal() * eigen.eigenvectors().transpose();
 	return inverse;
 }
 
