@@ -172,13 +172,9 @@ TEST_F(Motion, IsPlayedJudgedAndLeavesTheDocument)
 	const QImage alone = m_pOperator->See(middle, 150);
 	const auto clickGhost = [this] { QTest::mouseClick(&Widget<QCheckBox>("TakeGhost"), Qt::LeftButton, {}, {8, 8}); };
 	clickGhost();
-	m_pOperator->WaitForDrawing();
-	m_pOperator->WaitForDrawing();
-	EXPECT_NE(m_pOperator->See(middle, 150), alone);
+	EXPECT_EVENTUALLY(m_pOperator->See(middle, 150) != alone);
 	clickGhost();
-	m_pOperator->WaitForDrawing();
-	m_pOperator->WaitForDrawing();
-	EXPECT_EQ(m_pOperator->See(middle, 150), alone) << "and goes";
+	EXPECT_EVENTUALLY(m_pOperator->See(middle, 150) == alone) << "and goes";
 
 	// An edit is solved at once; numbers are those of what stands now.
 	m_pOperator->ClickRow("targets", 1);

@@ -86,9 +86,9 @@ bool VRetargetSetupCore::StandsAsMade() const
 	const auto pNow = TargetValues().m_pParametrised;
 	const auto pAtRest = TargetAtRest().m_pParametrised;
 	// A scale moves what is free along, and turns nothing.
-	constexpr std::size_t c_Turn = 3;
 	const auto turn = [](const VSubjectParametrised::VSegment& i_rSegment)
 	{
+		constexpr std::size_t c_Turn = 3;
 		const std::vector<double>& rPose = i_rSegment.m_Joint.m_BindPose;
 		return std::span(rPose).first(std::min(rPose.size(), c_Turn));
 	};
