@@ -1,5 +1,6 @@
 """What stands in the way of an installation is told in words, and a command that is asked for help does nothing else."""
 
+import json
 import os
 import pathlib
 import subprocess
@@ -55,6 +56,21 @@ class Setup(unittest.TestCase):
                 self.assertIn(text, result.stderr)
                 self.assertIn("== Installing 3 Debian packages: clang-format cppcheck python3\n", result.stdout)
                 self.assertNotIn("on\n", result.stdout)
+
+    def test_presets_state_what_they_need(self):
+        """A build folder keeps what it was configured with: `./run` leaves one without tests."""
+        presets = json.loads((ROOT / "CMakePresets.json").read_text(encoding="utf8"))["configurePresets"]
+        presets = {preset["name"]: preset for preset in presets}
+
+        def stated(name):
+            base = presets[name].get("inherits")
+            return (stated(base) if base else {}) | presets[name].get("cacheVariables", {})
+
+        for name, preset in presets.items():
+            if not preset.get("hidden"):
+                with self.subTest(name):
+                    self.assertEqual(stated(name).get("RETARGET_TESTS"), "OFF" if name in ("bench", "package") else "ON")
+                    self.assertEqual(stated(name).get("CMAKE_UNITY_BUILD"), "ON" if name == "package" else "OFF")
 
     def test_answers_help(self):
         for command in ("run", "test", "check"):
