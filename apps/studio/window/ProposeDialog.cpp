@@ -14,6 +14,7 @@
 #include <QFileDialog>
 #include <QHeaderView>
 #include <QLabel>
+#include <QLocale>
 #include <QPushButton>
 #include <QSignalBlocker>
 #include <QTableWidget>
@@ -85,6 +86,7 @@ VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::
 	m_pTable->verticalHeader()->hide();
 	m_pTable->horizontalHeader()->setStretchLastSection(true);
 	m_pTable->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+	m_pLeastScore->setLocale(QLocale::c());
 	m_pLeastScore->setRange(0.0, 1.0);
 	m_pLeastScore->setSingleStep(0.05);
 	m_pLeastScore->setValue(c_LeastScore);
@@ -277,6 +279,7 @@ void VProposeDialog::AddRow(int i_Source, int i_Target, const QString& i_rReason
 	for (const int column : {EPosition, ERotation})
 	{
 		auto* const pWeight = new QDoubleSpinBox;
+		pWeight->setLocale(QLocale::c());
 		pWeight->setRange(0.0, c_MostWeight);
 		pWeight->setSingleStep(0.1);
 		pWeight->setFrame(false);

@@ -177,8 +177,10 @@ QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains, const Q
 	choice.m_bArms = i_rChains.value(1).toBool();
 	choice.m_bLegs = i_rChains.value(2).toBool();
 	choice.m_bOthers = i_rChains.value(3).toBool();
+	const auto pTarget = TargetValues().m_pParametrised;
 	for (const QVariant& rSegment : i_rLocked)
-		choice.m_Locked.insert(std::size_t(rSegment.toInt()));
+		if (const int segment = rSegment.toInt(); pTarget && segment >= 0 && segment < int(pTarget->m_Segments.size()))
+			choice.m_Locked.insert(std::size_t(segment));
 	const auto alignment = VRetargetSetupCore::AlignToSource(choice, m_Alignment);
 	m_pAligned = TargetValues().m_pParametrised;
 	if (!alignment)
