@@ -141,8 +141,8 @@ def test_threads_share_a_session(saved):
 
 
 def test_types_name_what_there_is():
-    stub = ast.parse((pathlib.Path(rs.__file__).parent / "__init__.pyi").read_text(encoding="utf8"))
-    named = {getattr(node, "name", None) or node.target.id for node in stub.body
+    types = ast.parse((pathlib.Path(rs.__file__).parent / "__init__.pyi").read_text(encoding="utf8"))
+    named = {getattr(node, "name", None) or node.target.id for node in types.body
              if isinstance(node, (ast.ClassDef, ast.FunctionDef, ast.AnnAssign))}
     assert named >= set(rs.__all__)
 

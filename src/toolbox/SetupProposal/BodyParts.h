@@ -12,6 +12,13 @@ namespace SetupProposal
 /// How well each part would fit a joint, as logarithms: 0 is as good as it gets.
 using VPartLogs = VPartScores;
 
+/// Of the normal distribution's density, without its factor: 0 at the mean.
+inline double LogOfNormal(double i_Value, double i_Mean, double i_Deviation)
+{
+	const double away = (i_Value - i_Mean) / i_Deviation;
+	return -0.5 * away * away;
+}
+
 /// What each of the voters says of a joint, and what they say together.
 struct VJointReading
 {

@@ -59,12 +59,6 @@ constexpr double c_WorstVote = -4.5;
 constexpr double c_NoPart = -2.2;
 constexpr double c_End = -1.0;
 
-double Gaussian(double i_Value, double i_Mean, double i_Deviation)
-{
-	const double away = (i_Value - i_Mean) / i_Deviation;
-	return -0.5 * away * away;
-}
-
 } // namespace
 
 std::vector<VPartLogs> VoteByRestPose(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame)
@@ -83,8 +77,9 @@ std::vector<VPartLogs> VoteByRestPose(const VRestSkeleton& i_rSkeleton, const VB
 			const VExpected& rExpected = c_Expected[part];
 			double score =
 			    std::max(c_WorstPlace,
-			        Gaussian(UsualUp(i_rFrame, place.m_Up), rExpected.m_Up, c_Lenient * rExpected.m_UpDeviation))
-			    + std::max(c_WorstPlace, Gaussian(std::abs(place.m_Left), rExpected.m_Out, rExpected.m_OutDeviation));
+			        LogOfNormal(UsualUp(i_rFrame, place.m_Up), rExpected.m_Up, c_Lenient * rExpected.m_UpDeviation))
+			    + std::max(
+			        c_WorstPlace, LogOfNormal(std::abs(place.m_Left), rExpected.m_Out, rExpected.m_OutDeviation));
 			if (children[i] < 0)
 				score += part == EHead || part == EFoot || rExpected.m_Length < 0.03 ? 0.0 : c_Childless;
 			else if (rExpected.m_Length > 0.0)

@@ -50,12 +50,6 @@ constexpr double c_OtherSkin = -2.2;
 /// Less than this share of all weights is as good as nothing.
 constexpr double c_LeastShare = 1e-4;
 
-double LogNormal(double i_Value, double i_Mean, double i_Deviation)
-{
-	const double away = (i_Value - i_Mean) / i_Deviation;
-	return -0.5 * away * away;
-}
-
 } // namespace
 
 std::vector<VPartLogs> VoteBySkin(const VRestSkeleton& i_rSkeleton, const VBodyFrame& i_rFrame)
@@ -80,8 +74,8 @@ std::vector<VPartLogs> VoteBySkin(const VRestSkeleton& i_rSkeleton, const VBodyF
 			}
 			const double ratio = std::log(spread / rExpected.m_Spread);
 			const double out = std::abs(centre.m_Left);
-			const double fit = std::max(c_WorstSkinPlace, LogNormal(up, rExpected.m_Up, rExpected.m_UpDeviation))
-			    + std::max(c_WorstSkinPlace, LogNormal(out, rExpected.m_Out, rExpected.m_OutDeviation))
+			const double fit = std::max(c_WorstSkinPlace, LogOfNormal(up, rExpected.m_Up, rExpected.m_UpDeviation))
+			    + std::max(c_WorstSkinPlace, LogOfNormal(out, rExpected.m_Out, rExpected.m_OutDeviation))
 			    + std::max(c_WorstSkinSpread, -0.5 * ratio * ratio / 0.6);
 			votes[i][part] = std::max(c_WorstSkin, fit);
 		}
