@@ -3,8 +3,9 @@
 
     character.py TABLE NAME --retarget PROGRAM --subject OUT.qrr --record OUT.json
 
-A character that cannot be made is a record, too, with the messages, and no subject: the exit status is 0. What says
-nothing about the character, as a full disk or a missing program, is a failure, to be tried again.
+A character that cannot be made is a record, too, with the messages: the exit status is 0, and a subject that an earlier
+run made stays as it was. What says nothing about the character, as a full disk or a missing program, is a failure, to
+be tried again.
 """
 import argparse
 import json
@@ -71,10 +72,9 @@ def main():
         raise SystemExit(str(error)) from error
     except KeyError as error:
         raise SystemExit(f"{options.table}: there is no \"{options.name}\"") from error
-    # The subject of files that have changed since must not be taken for that of these.
-    if os.path.exists(options.subject):
-        os.remove(options.subject)
     record = {"name": options.name} | make(options.retarget, row, options.subject)
+    # Of files as they were: the page must not show it as made of these.
+    record["kept"] = not record["made"] and os.path.exists(options.subject)
     with open(options.record + ".new", "w", encoding="utf8") as file:
         json.dump(record, file, indent=1)
     os.replace(options.record + ".new", options.record)

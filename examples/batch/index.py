@@ -27,6 +27,8 @@ def state(record):
 def said(record):
     """What a person should read of a character, a sentence each."""
     yield from (message["text"] for message in record["messages"] if message.get("text"))
+    if record["kept"]:
+        yield f"The subject is that of an earlier run: {record['name']}.qrr is as it was."
     yield from record.get("pose", [])
     for pair in record.get("unlike", []):
         yield (f"the pair {pair['source']}:{pair['target']} became {pair['foundSource']}:{pair['foundTarget']}"
@@ -44,7 +46,7 @@ def row(record, folder):
     picture = f"pictures/{name}.png"
     shown = os.path.exists(os.path.join(folder, picture)) and os.path.getsize(os.path.join(folder, picture)) > 0
     link = html.escape(name)
-    if record["made"]:
+    if record["made"] or record["kept"]:
         link = f'<a href="subjects/{link}.qrr">{link}</a>'
     cells = [link, WORDS[state(record)], *(str(record.get(key, "")) for key in ("segments", "joints", "targets")),
              number(record.get("distance"), 1, "mm"), number(record.get("angle"), 57.29577951308232, "degrees"),

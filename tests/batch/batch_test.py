@@ -37,10 +37,12 @@ class Batch(unittest.TestCase):
         self.assertTrue(fine["made"] and subject.exists(), fine)
         self.assertEqual((fine["targets"], fine["findings"], fine["unlike"], fine["messages"]), (34, [], [], []))
         self.assertTrue(fine["distance"] < 0.001 and len(fine["inputs"]) == 4, fine)
-        # It must not be taken for the subject of the file that is damaged now.
-        subject.with_name("character0003.qrr").write_text("of yesterday")
+        # A set-up of yesterday stays, but is not taken for that of the file that is damaged now.
+        of_yesterday = subject.read_bytes()
+        subject.with_name("character0003.qrr").write_bytes(of_yesterday)
         done, subject, damaged = self.make("character0003")
-        self.assertEqual((done.returncode, damaged["made"], subject.exists()), (0, False, False))
+        self.assertEqual((done.returncode, damaged["made"], damaged["kept"]), (0, False, True))
+        self.assertEqual(subject.read_bytes(), of_yesterday)
         self.assertIn("File is corrupted", damaged["messages"][0]["text"])
         # What is not the character's fault is tried again.
         (self.folder / "character0000.json").unlink()
@@ -51,6 +53,7 @@ class Batch(unittest.TestCase):
         page = index.page([fine, damaged], str(self.folder))
         self.assertIn("2 characters: 1 not made, 0 to be looked at, 1 fine.", page)
         self.assertLess(page.index("character0003"), page.index("character0000"))
+        self.assertIn("The subject is that of an earlier run: character0003.qrr is as it was.", page)
         self.assertTrue("&lt;b&gt;&quot;&amp;" in page and "<b>" not in page, page)
 
     def test_wrong_tables(self):
