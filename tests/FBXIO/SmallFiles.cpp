@@ -288,7 +288,7 @@ static VList OldRecords(const VNumbers& i_rMatrix)
 	    Record("Takes", {}, {Record("Current", {"second"}), take("first", 7), take("second", 5)})};
 }
 
-std::vector<VTestRecord> FbxTest::SmallRecords(const VSmallFile& i_rFile)
+std::vector<VTestRecord> FbxTest::SmallRecords(const VSmallFile& i_rFile, const std::string& i_rPicture)
 {
 	const VTestScene scene{{{"hips", "LimbNode", -1, {}}, {"knee", "LimbNode", 0, {{"Lcl Translation", {0, 5, 0}}}},
 	                           {"body", "Mesh", -1, {}}},
@@ -301,7 +301,7 @@ std::vector<VTestRecord> FbxTest::SmallRecords(const VSmallFile& i_rFile)
 	        {"ByVertice", "Direct", {0, 0, 1, 0, 0, 1, 0, 0, 1, 0, 0, 1}, {}},
 	        {"ByPolygonVertex", "IndexToDirect", {0, 0, 1, 0, 0, 1, 1, 1}, {0, 1, 2, 1, 3, 2}},
 	        {"ByPolygon", "IndexToDirect", {}, {0, 1}},
-	        {{"phong", {{"DiffuseColor", {1, 0.5, 0}}}, "", "none.png"},
+	        {{"phong", {{"DiffuseColor", {1, 0.5, 0}}}, "", "none.png", i_rPicture},
 	            {"lambert", {{"TransparentColor", {0.25, 0.25, 0.25}}, {"TransparencyFactor", {1}}}, "", ""}},
 	        {{0, {0, 1, 2}, {1, 0.5, 0.25}, matrix, matrix}, {1, {1, 2, 3}, {0.5, 0.75, 1}, matrix, matrix}}}});
 	if (!i_rFile.m_bPlain)

@@ -22,7 +22,8 @@ inline constexpr VSmallFile c_SmallFiles[]{{"Binary6100", c_Forms[0]}, {"Binary7
     {"PlainArrays", {"Binary7700", EForm::Binary, 7700}, true}, {"Binary5800", {"Binary5800", EForm::Binary, 5800}}};
 
 /// Two triangles with every kind of layer, two materials, a texture, on two bones.
-std::vector<VTestRecord> SmallRecords(const VSmallFile& i_rFile);
+/// @param i_rPicture stands in the file, since version 6
+std::vector<VTestRecord> SmallRecords(const VSmallFile& i_rFile, const std::string& i_rPicture = {});
 
 /// Some changes of bytes: bits, numbers that are often wrong, pieces that are lost, doubled or put elsewhere.
 std::string MutateBytes(std::string i_Bytes, std::mt19937& io_rRandom);

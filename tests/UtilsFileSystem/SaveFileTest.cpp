@@ -101,6 +101,7 @@ TEST(SaveFile, FollowsLinks)
 	create_symlink("b", folder / "a");
 	create_symlink("a", folder / "b");
 	ExpectRefused(folder / "a", "too many symbolic links", NVX::Status::c_FileNotOpened);
+	ExpectRefused(folder / std::string(300, 'x'), "File name too long", NVX::Status::c_FileNotOpened);
 }
 
 TEST(SaveFile, RefusesWhatIsNoPlaceForAFile)

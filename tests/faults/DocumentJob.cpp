@@ -1,5 +1,5 @@
 // The panel's document without a panel, for faults: builds a target subject of an FBX file and saves it, and reads it
-// back. FILE.qrr is replaced. Exit statuses are those of the contract.
+// back, once or as often as it is told. FILE.qrr is replaced. Exit statuses are those of the contract.
 
 #include "CommandLineText/ExitStatus.h"
 #include "InMemoryHost/PluginContext.h"
@@ -71,11 +71,17 @@ int Run(char** i_ppArguments)
 	Step([&] { document.SetTargetScale(1.25); });
 	if (bIgnored)
 		return CommandLine::EBadInput;
-	Step([&] { document.SaveTargetSubjectURL(file); });
-	if (!bSaved)
-		return CommandLine::EBadOutput;
-	Step([&] { document.LoadTargetSubjectURL(file); });
-	return bLoaded && !bIgnored ? CommandLine::EFine : CommandLine::EBadInput;
+	for (long times = i_ppArguments[4] ? std::atol(i_ppArguments[4]) : 1; times > 0; --times)
+	{
+		bSaved = bLoaded = false;
+		Step([&] { document.SaveTargetSubjectURL(file); });
+		if (!bSaved)
+			return CommandLine::EBadOutput;
+		Step([&] { document.LoadTargetSubjectURL(file); });
+		if (!bLoaded || bIgnored)
+			return CommandLine::EBadInput;
+	}
+	return CommandLine::EFine;
 }
 
 } // namespace
@@ -83,9 +89,9 @@ int Run(char** i_ppArguments)
 /// Leaves without Qt's own cleaning up.
 int main(int i_Count, char** i_ppArguments)
 {
-	if (i_Count != 4)
+	if (i_Count != 4 && i_Count != 5)
 	{
-		std::fputs("usage: document_job FILE.qrr CHARACTER.fbx PERFORMER.qrs\n", stderr);
+		std::fputs("usage: document_job FILE.qrr CHARACTER.fbx PERFORMER.qrs [TIMES]\n", stderr);
 		return CommandLine::EWrongUsage;
 	}
 	try

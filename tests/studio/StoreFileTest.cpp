@@ -31,6 +31,7 @@ TEST(StoreFile, ValuesAsText)
 	    {ToVariant(std::numeric_limits<std::int64_t>::min()), "Int64 -9223372036854775808"},
 	    {ToVariant(0.1f), "Float32 0.10000000149011612"},
 	    {ToVariant(0.1), "Float64 0.10000000000000001"},
+	    {ToVariant(-std::numeric_limits<float>::infinity()), "Float32 -inf"},
 	    {ToVariant(std::string()), "String "},
 	    {ToVariant(std::string("/a b/100%/\xC3\xBC.qrs")), "String /a b/100%25/%C3%BC.qrs"},
 	    {ToVariant(std::string("\0\n\xFF", 3)), "String %00%0A%FF"},
@@ -44,7 +45,7 @@ TEST(StoreFile, ValuesAsText)
 	}
 	EXPECT_EQ(PrintValue({}), "");
 	for (const char* pBad : {"", "Float64", "Float64 ", "Float64 1,5", "Float64 1.5x", "Int8 200", "UInt32 -1",
-	         "Bool yes", "List 1", "Void ", "Colour red"})
+	         "Bool yes", "List 1", "Void ", "Colour red", "Float32 1e39"})
 	{
 		VVariant untouched = ToVariant(std::string("untouched"));
 		EXPECT_FALSE(ParseValue(pBad, untouched)) << pBad;

@@ -319,9 +319,14 @@ TEST_F(Window, TheMenuTellsWhatSaveDoes)
 	EXPECT_EQ(shown("New"), "&New Retarget Subject (there is no target subject yet) off");
 
 	Action("OperatorPage").trigger();
-	const auto* const pPage = m_pWindow->findChild<QTextBrowser*>("OperatorPageText");
+	auto* const pPage = m_pWindow->findChild<QTextBrowser*>("OperatorPageText");
 	ASSERT_TRUE(pPage && pPage->isVisible());
 	EXPECT_TRUE(pPage->toPlainText().contains("A good bind pose"));
+	// By the keyboard: its one link leads to the page on motion.
+	pPage->setFocus();
+	QTest::keyClick(pPage, Qt::Key_Tab);
+	QTest::keyClick(pPage, Qt::Key_Return);
+	EXPECT_EQ(pPage->source().fileName(), "motion.md");
 }
 
 TEST_F(Window, SaysWhyThereIsNoPanel)

@@ -10,6 +10,7 @@
 #include <QByteArray>
 
 #include <charconv>
+#include <cmath>
 #include <type_traits>
 
 using NVX::IO::EType;
@@ -50,7 +51,14 @@ template <typename T>
 requires std::is_arithmetic_v<T> QString Print(T i_Value)
 {
 	if constexpr (std::is_floating_point_v<T>)
+	{
+		// In the spelling that can be read back.
+		if (!std::isfinite(i_Value))
+			return std::isnan(i_Value) ? QStringLiteral("nan")
+			    : i_Value < 0          ? QStringLiteral("-inf")
+			                           : QStringLiteral("inf");
 		return QString::fromStdString(NumberText::PrintG17(double(i_Value)));
+	}
 	else
 		return QString::number(i_Value);
 }
@@ -74,7 +82,7 @@ bool Parse(const std::string& i_rText, T& o_rValue)
 		double value = 0.0;
 		const bool bRead = NumberText::ScanWholeReal(i_rText, value);
 		o_rValue = T(value);
-		return bRead;
+		return bRead && std::isinf(o_rValue) == std::isinf(value);
 	}
 	else
 	{

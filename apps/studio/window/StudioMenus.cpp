@@ -21,7 +21,6 @@
 #include <QClipboard>
 #include <QDialog>
 #include <QDockWidget>
-#include <QFile>
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QGuiApplication>
@@ -30,6 +29,7 @@
 #include <QMessageBox>
 #include <QTextBrowser>
 #include <QTimer>
+#include <QUrl>
 #include <QVBoxLayout>
 
 #include <tuple>
@@ -469,9 +469,8 @@ void VStudioWindow::ShowOperatorPage()
 	pDialog->setAttribute(Qt::WA_DeleteOnClose);
 	pDialog->setWindowTitle(tr("Operator's Page"));
 	auto* const pText = Named(new QTextBrowser, "OperatorPageText", tr("The operator's page"));
-	QFile file(QStringLiteral(":/help/operator.md"));
-	if (file.open(QIODevice::ReadOnly))
-		pText->setMarkdown(QString::fromUtf8(file.readAll()));
+	// Its links lead to the pages beside it.
+	pText->setSource(QUrl(QStringLiteral("qrc:/help/operator.md")), QTextDocument::MarkdownResource);
 	auto* const pLayout = new QVBoxLayout(pDialog);
 	pLayout->setContentsMargins(0, 0, 0, 0);
 	pLayout->addWidget(pText);

@@ -22,21 +22,24 @@ using boost::filesystem::path;
 using boost::system::error_code;
 
 /// The file that a path means at last; a link may point to a file that is yet to be made.
-/// @return false if links go round in circles.
-bool FollowLinks(path& io_rPath)
+/// @return why that cannot be told; empty if it can. What is not known to be no link must not be replaced.
+std::string FollowLinks(path& io_rPath)
 {
 	constexpr int c_MaximumLinks = 40;
 	for (int links = 0; links < c_MaximumLinks; ++links)
 	{
 		error_code error;
-		if (!is_symlink(symlink_status(io_rPath, error)))
-			return true;
+		const boost::filesystem::file_status status = symlink_status(io_rPath, error);
+		if (status.type() == boost::filesystem::status_error)
+			return error.message();
+		if (!is_symlink(status))
+			return {};
 		const path target = read_symlink(io_rPath, error);
 		if (error)
-			return true;
+			return error.message();
 		io_rPath = target.is_absolute() ? target : io_rPath.parent_path() / target;
 	}
-	return false;
+	return "too many symbolic links";
 }
 
 /// The file of a save on its way, where a signal handler finds it.
@@ -134,10 +137,13 @@ std::uint32_t SaveFile(const path& i_rPath, std::string_view i_Bytes, std::strin
 	};
 
 	path target = i_rPath;
-	if (!FollowLinks(target))
-		return fail(NVX::Status::c_FileNotOpened, "too many symbolic links");
+	if (const std::string reason = FollowLinks(target); !reason.empty())
+		return fail(NVX::Status::c_FileNotOpened, reason);
 	error_code error;
 	const boost::filesystem::file_status status = boost::filesystem::status(target, error);
+	// Its rights are not known.
+	if (status.type() == boost::filesystem::status_error)
+		return fail(NVX::Status::c_FileNotOpened, error.message());
 	const bool bExists = exists(status);
 	if (is_directory(status))
 		return fail(NVX::Status::c_FileNotOpened, "it is a folder");
