@@ -55,6 +55,14 @@ function(retarget_library name)
 	retarget_install(${name} ${CMAKE_CURRENT_SOURCE_DIR} ${arg_INTERNAL})
 endfunction()
 
+# retarget_qml(NAME FILE.qrc): the QML files of a resource file, compiled: a first start need not do it.
+function(retarget_qml name file)
+	find_package(Qt5QuickCompiler REQUIRED)
+	qtquick_compiler_add_resources(sources ${file})
+	set_source_files_properties(${sources} PROPERTIES SKIP_AUTOMOC ON)
+	target_sources(${name} PRIVATE ${sources})
+endfunction()
+
 # retarget_install(NAME FOLDER [INTERNAL...]): the library and the headers of a folder go into the installed package, but
 # for the headers of these names, which are for the library alone; ALL are all.
 function(retarget_install name folder)
