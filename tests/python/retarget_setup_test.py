@@ -16,11 +16,13 @@ import retarget_setup as rs
 ROOT = pathlib.Path(__file__).resolve().parents[2]
 FBX = ROOT / "demo/character.fbx"
 SOURCE = ROOT / "demo/performer.qrs"
+TAKE = ROOT / "demo/walk.bvh"
 EDITS = ["match-file-pose", "auto", ("weight", "0=0.25"), "prune-joints", "update-targets"]
 
 
 def retarget(*words):
-    subprocess.run([os.environ["RETARGET"], "-q", *map(str, words)], check=True, capture_output=True)
+    command = [os.environ["RETARGET"], "-q", *map(str, words)]
+    return subprocess.run(command, check=True, capture_output=True, text=True).stdout
 
 
 @pytest.fixture(scope="module")
@@ -69,6 +71,35 @@ def test_poses_of_many_frames():
     assert kinematics.bind_pose() == pytest.approx([0, 0, 0, 0, 0, 0, 0, 0, 0.5])
 
 
+def test_a_take_is_solved_as_on_the_command_line(saved):
+    session, take = rs.load(saved, source=SOURCE), rs.Take(TAKE)
+    solved = session.solve(take, first=10, last=19)
+    lines = retarget("solve", saved, "--take", TAKE, "--source", SOURCE, "--frames", "10:19", "--csv").splitlines()[1:]
+    told = np.array([[float(cell or "nan") for cell in line.split(",")[4:]] for line in lines])
+    units = np.array([math.radians(1) if target["unit"] == "deg" else 1 for target in solved.report["targets"]])
+    assert solved.residuals == pytest.approx(told * units, abs=1e-6, nan_ok=True) and solved.first == 10
+    assert session.targets() == rs.load(saved, source=SOURCE).targets()
+    # Rigid bones, each where the take's joint is, as far as the performer has the take's size.
+    poses, joints = take.poses(session.source, 10, 19), take.joint_poses(10, 19)
+    assert poses.shape == (10, len(session.source.subject.segments), 4, 4)
+    pelvis = [name for name, parent in take.joints()].index("Pelvis")
+    assert poses[:, 0, :3, 3] - poses[0, 0, :3, 3] == pytest.approx(
+        solved.report["scale"] * (joints[:, pelvis, :3, 3] - joints[0, pelvis, :3, 3]), abs=0.5)
+    assert [segment.name for segment in take.performer().subject.segments] == [name for name, _ in take.joints()]
+
+
+def test_proposed_and_aligned(saved):
+    session = rs.load(saved, source=SOURCE)
+    assert {"source": "Cranium", "target": "skull"}.items() <= next(
+        pair for pair in session.propose()["pairs"] if pair["source"] == "Cranium").items()
+    before = session.target.subject
+    told = session.align(chains=["arms"], lock=["palmLeft"])
+    assert told and session.report["aligned"] == told
+    changed = {a.name for a, b in zip(before.segments, session.target.subject.segments)
+               if a.joint.bind_pose != b.joint.bind_pose}
+    assert "palmLeft" not in changed
+
+
 def broken(change):
     file = arm()
     change(file)
@@ -81,6 +112,13 @@ def broken(change):
     (rs.Error, 'no source segment "Nobody"', lambda path: rs.create(FBX, SOURCE, edits=[("position", "Nobody:skull")])),
     (rs.Error, 'there is no edit "--fly"', lambda path: rs.create(FBX, edits=["fly"])),
     (rs.Error, "make no tree", lambda path: rs.Kinematics(rs.SkeletonFile())),
+    (rs.Error, "could not be read as a take", lambda path: rs.Take(SOURCE)),
+    (rs.Error, "Nobody", lambda path: rs.Take(TAKE).poses(rs.read(SOURCE), joints=[("Nobody", "Pelvis")])),
+    (rs.Error, "has no targets", lambda path: rs.create(FBX, SOURCE).solve(rs.Take(TAKE))),
+    (rs.Error, "the take has the frames 0 to", lambda path: rs.create(FBX, SOURCE, edits=["auto"]).solve(
+        rs.Take(TAKE), first=9, last=3)),
+    (ValueError, "the take has the frames 0 to", lambda path: rs.Take(TAKE).joint_poses(last=100000)),
+    (ValueError, 'up is "y" or "z"', lambda path: rs.Take(TAKE, up="x")),
     (rs.Error, "none", lambda path: arm().write(path / "none" / "arm.qrs")),
     (ValueError, "states have a row of 9", lambda path: rs.Kinematics(arm()).poses([[1, 2, 3]])),
     (ValueError, "the versions are 1.0", lambda path: arm().write(path / "arm.qrs", version="9.9")),
@@ -148,7 +186,7 @@ def test_types_name_what_there_is():
 
 
 def test_the_documents_example(tmp_path, monkeypatch):
-    for file in (FBX, SOURCE):
+    for file in (FBX, SOURCE, TAKE):
         (tmp_path / file.name).symlink_to(file)
     monkeypatch.chdir(tmp_path)
     text = (ROOT / "docs/python.md").read_text(encoding="utf8")

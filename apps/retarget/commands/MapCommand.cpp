@@ -26,49 +26,6 @@ struct VMapSettings
 	std::string m_MinimumScore;
 };
 
-VJson ToJson(const VProposedPair& i_rPair, const VMapped& i_rMapped)
-{
-	VJson item{{"source", i_rMapped.m_Source[i_rPair.m_Source].m_Name},
-	    {"target", i_rMapped.m_Target[i_rPair.m_Target].m_Name}, {"score", std::round(1e4 * i_rPair.m_Score) / 1e4},
-	    {"reasons", i_rPair.m_Reasons}};
-	if (i_rPair.m_PositionWeight > 0.0)
-		item["position"] = i_rPair.m_PositionWeight;
-	if (i_rPair.m_RotationWeight > 0.0)
-		item["rotation"] = i_rPair.m_RotationWeight;
-	return item;
-}
-
-VJson ToJson(const std::vector<VProposedPair>& i_rPairs, const VMapped& i_rMapped)
-{
-	VJson list = VJson::array();
-	for (const VProposedPair& rPair : i_rPairs)
-		list.push_back(ToJson(rPair, i_rMapped));
-	return list;
-}
-
-VJson ToJson(const std::vector<SetupProposal::VUnmapped>& i_rUnmapped, const VRestSkeleton& i_rSkeleton)
-{
-	VJson list = VJson::array();
-	for (const auto& rUnmapped : i_rUnmapped)
-		list.push_back({{"name", i_rSkeleton[rUnmapped.m_Joint].m_Name}, {"reason", rUnmapped.m_Reason}});
-	return list;
-}
-
-VJson ToJson(const VMapped& i_rMapped)
-{
-	const SetupProposal::VProposal& rProposal = i_rMapped.m_Proposal;
-	VJson json{{"pairs", ToJson(rProposal.m_Pairs, i_rMapped)},
-	    {"alternatives", ToJson(rProposal.m_Alternatives, i_rMapped)},
-	    {"unmapped",
-	        {{"source", ToJson(rProposal.m_UnmappedSources, i_rMapped.m_Source)},
-	            {"target", ToJson(rProposal.m_UnmappedTargets, i_rMapped.m_Target)}}}};
-	if (!rProposal.m_NoBody.empty())
-		json["noBody"] = rProposal.m_NoBody;
-	if (i_rMapped.m_Root >= 0)
-		json["root"] = i_rMapped.m_Target[std::size_t(i_rMapped.m_Root)].m_Name;
-	return json;
-}
-
 std::string KindOf(const VProposedPair& i_rPair)
 {
 	std::string text;
@@ -137,7 +94,7 @@ EExitStatus Map(const VMapSettings& i_rSettings)
 		session.m_MinimumScore = ParseScore(i_rSettings.m_MinimumScore);
 	const VMapped mapped = i_rSettings.m_Fbx.empty() ? ProposeForSubject(session) : ProposeForFile(session);
 	const auto findings = SetupProposal::CheckPose(mapped.m_Source, mapped.m_Target, mapped.m_Proposal);
-	VJson json = ToJson(mapped);
+	VJson json = MappedToJson(mapped);
 	json["pose"] = PoseJson(findings);
 	PrintResult(json, ToText(mapped) + PoseText(findings));
 	return EFine;

@@ -1,3 +1,4 @@
+#include "retarget/python/Arrays.h"
 #include "retarget/python/Call.h"
 #include "retarget/python/Files.h"
 #include "retarget/python/Records.h"
@@ -6,7 +7,6 @@
 #include "ComputeSubjectFK/SegmentFKInterfaces.h"
 #include "CoreOrlexTypesUtils/joints/PoseVector.h"
 
-#include <pybind11/numpy.h>
 #include <pybind11/stl.h>
 
 #include <limits>
@@ -18,13 +18,7 @@ namespace
 {
 
 namespace py = pybind11;
-using VNumbers = py::array_t<double, py::array::c_style | py::array::forcecast>;
 using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
-
-VNumbers ToArray(const std::vector<double>& i_rValues)
-{
-	return VNumbers(py::ssize_t(i_rValues.size()), i_rValues.data());
-}
 
 /// Threads of Python that use one wait for each other.
 class VPythonKinematics
@@ -81,17 +75,7 @@ public:
 		    [&](double* o_pOut)
 		    {
 			    for (std::size_t i = 0; i < count; ++i)
-			    {
-				    const Rotation::VPose<double> pose = m_Kinematics.Segment(i).SegmentPose();
-				    for (std::size_t row = 0; row < 3; ++row)
-				    {
-					    for (std::size_t column = 0; column < 3; ++column)
-						    *o_pOut++ = pose.R[3 * row + column];
-					    *o_pOut++ = pose.t[row];
-				    }
-				    for (const double value : {0.0, 0.0, 0.0, 1.0})
-					    *o_pOut++ = value;
-			    }
+				    WriteMatrix(m_Kinematics.Segment(i).SegmentPose(), o_pOut);
 		    });
 	}
 

@@ -2,6 +2,7 @@
 #include "retarget/python/Files.h"
 #include "retarget/python/Records.h"
 #include "retarget/python/Session.h"
+#include "retarget/python/Takes.h"
 
 /// What the package retarget_setup is made of. Its own classes give it names, types and documentation.
 PYBIND11_MODULE(_core, io_rModule)
@@ -19,6 +20,7 @@ PYBIND11_MODULE(_core, io_rModule)
 	DefineFiles(io_rModule);
 	DefineKinematics(io_rModule);
 	DefineSession(io_rModule);
+	DefineTakes(io_rModule);
 	io_rModule.attr("version") = RETARGET_VERSION;
 	BeginListening();
 	// Threads that log must not come into an interpreter that ends.

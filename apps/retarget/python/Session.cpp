@@ -1,10 +1,14 @@
 #include "retarget/python/Session.h"
 
+#include "retarget/python/Arrays.h"
 #include "retarget/python/Call.h"
 #include "retarget/python/Files.h"
 #include "retarget/python/Records.h"
+#include "retarget/python/Takes.h"
 #include "retarget/subject/Aligning.h"
 #include "retarget/subject/Making.h"
+#include "retarget/subject/Mapping.h"
+#include "retarget/subject/PlayedTake.h"
 #include "retarget/subject/Session.h"
 #include "retarget/subject/TargetLines.h"
 
@@ -81,6 +85,26 @@ public:
 		return JsonText(LinesToJson(TargetLines(m_Session, bResiduals), bResiduals));
 	}
 
+	/// As "map --json" tells it.
+	std::string Propose()
+	{
+		const std::lock_guard lock(m_Mutex);
+		return JsonText(MappedToJson(ProposeForSubject(m_Session)));
+	}
+
+	std::unique_ptr<const VPlayedTake> Solve(const VPythonTake& i_rTake, std::optional<std::size_t> i_First,
+	    std::optional<std::size_t> i_Last, const TakeSolve::VSourceSettings& i_rSettings)
+	{
+		const std::lock_guard lock(m_Mutex);
+		VTakeToPlay what;
+		if (const auto pSubject = m_Session.Document().TargetValues().m_pParametrised)
+			what.m_Subject = pSubject->m_Name;
+		what.m_Take = i_rTake.m_Path;
+		what.m_FirstFrame = i_First;
+		what.m_LastFrame = i_Last;
+		return PlayTake(m_Session, what, i_rTake.m_pTake, i_rSettings);
+	}
+
 	/// What edits have told.
 	std::string Report()
 	{
@@ -105,6 +129,27 @@ private:
 py::object FromJson(const std::string& i_rText)
 {
 	return py::module_::import("json").attr("loads")(TextToPython(i_rText));
+}
+
+/// (first frame, rate, states, residuals, iterations, converged, what "solve --json" prints)
+py::tuple Solved(VPythonSession& io_rSession, const VPythonTake& i_rTake, std::optional<std::size_t> i_First,
+    std::optional<std::size_t> i_Last, const VJointNames& i_rJoints, std::optional<std::size_t> i_RestFrame)
+{
+	std::unique_ptr<const VPlayedTake> pPlayed;
+	std::string json;
+	Call(
+	    [&]
+	    {
+		    pPlayed = io_rSession.Solve(i_rTake, i_First, i_Last, ToSettings(i_rJoints, i_RestFrame));
+		    json = JsonText(SolveToJson(pPlayed->Result()));
+	    });
+	const TakeSolve::VSolvedTake& rSolved = pPlayed->m_Solved;
+	const auto frames = py::ssize_t(rSolved.m_Frames);
+	return py::make_tuple(rSolved.m_First, i_rTake.m_pTake->m_Rate,
+	    ToArray(rSolved.m_States).reshape({frames, py::ssize_t(rSolved.m_NumberOfStates)}),
+	    ToArray(rSolved.m_Residuals).reshape({frames, py::ssize_t(rSolved.m_NumberOfTargets)}),
+	    py::array_t<std::uint32_t>(frames, rSolved.m_Iterations.data()),
+	    py::array_t<std::uint8_t>(frames, rSolved.m_Converged.data()).attr("astype")("bool"), FromJson(json));
 }
 
 std::shared_ptr<VPythonSession> Make(const std::optional<std::string>& i_rFbx,
@@ -168,6 +213,14 @@ void DefineSession(py::module_& io_rModule)
 		        Call([&] { json = io_rSession.Targets(); });
 		        return FromJson(json);
 	        })
+	    .def("propose",
+	        [](VPythonSession& io_rSession)
+	        {
+		        std::string json;
+		        Call([&] { json = io_rSession.Propose(); });
+		        return FromJson(json);
+	        })
+	    .def("solve", &Solved)
 	    .def("report",
 	        [](VPythonSession& io_rSession)
 	        {

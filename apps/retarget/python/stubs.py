@@ -15,12 +15,17 @@ RETURNS = {
     "poses": "NDArray[np.float64]", "markers": "NDArray[np.float64]", "rotations": "NDArray[np.float64]",
     "edit": "None", "edits": "None", "targets": "list[dict[str, Any]]", "save": "None", "__init__": "None",
     "__str__": "str", "target": "SkeletonFile", "source": "SkeletonFile | None", "report": "dict[str, Any]",
+    "joints": "list[tuple[str, int]]", "joint_poses": "NDArray[np.float64]", "performer": "SkeletonFile",
+    "propose": "dict[str, Any]", "align": "dict[str, Any]", "solve": "Solved",
 }
 TAKES = {
     "path": "Path", "fbx": "Path", "source": "Path | None", "subject": "Path", "root": "str | None",
     "scale_root_height": "bool", "edits": "Edits", "version": "str | None", "name": "str", "value": "object",
     "before": "SkeletonFile", "after": "SkeletonFile", "states": "ArrayLike", "file": "SkeletonFile", "text": "str",
     "status": "int", "application_data": "ApplicationData | None",
+    "stack": "str | None", "up": "str | None", "unit": "float | None", "rate": "float | None", "take": "Take",
+    "first": "int | None", "last": "int | None", "joints": "Iterable[tuple[str, str]]", "rest_frame": "int | None",
+    "chains": "Iterable[str]", "lock": "Iterable[str]",
 }
 
 
@@ -51,6 +56,10 @@ def of_class(made) -> list[str]:
     if made is retarget_setup.Kinematics:
         lines += ["@property", "def number_of_states(self) -> int: ..."]
         lines += [f"def {name}(self) -> NDArray[np.float64]: ..." for name in ("bind_pose", "mean_pose", "t_pose")]
+    if made is retarget_setup.Take:
+        lines += ["@property", "def number_of_frames(self) -> int: ...", "@property", "def rate(self) -> float: ..."]
+        takes["source"] = "SkeletonFile"
+        takes["first"] = "int"
     if made is retarget_setup.SkeletonFile:
         lines += ["subject: Subject", "application_data: ApplicationData"]
     for name, member in vars(made).items():

@@ -35,6 +35,34 @@ VMapped Mapped(VSession& io_rSession, SetupProposal::VRestSkeleton i_Target)
 	return mapped;
 }
 
+VJson ToJson(const SetupProposal::VProposedPair& i_rPair, const VMapped& i_rMapped)
+{
+	VJson item{{"source", i_rMapped.m_Source[i_rPair.m_Source].m_Name},
+	    {"target", i_rMapped.m_Target[i_rPair.m_Target].m_Name}, {"score", std::round(1e4 * i_rPair.m_Score) / 1e4},
+	    {"reasons", i_rPair.m_Reasons}};
+	if (i_rPair.m_PositionWeight > 0.0)
+		item["position"] = i_rPair.m_PositionWeight;
+	if (i_rPair.m_RotationWeight > 0.0)
+		item["rotation"] = i_rPair.m_RotationWeight;
+	return item;
+}
+
+VJson ToJson(const std::vector<SetupProposal::VProposedPair>& i_rPairs, const VMapped& i_rMapped)
+{
+	VJson list = VJson::array();
+	for (const SetupProposal::VProposedPair& rPair : i_rPairs)
+		list.push_back(ToJson(rPair, i_rMapped));
+	return list;
+}
+
+VJson ToJson(const std::vector<SetupProposal::VUnmapped>& i_rUnmapped, const SetupProposal::VRestSkeleton& i_rSkeleton)
+{
+	VJson list = VJson::array();
+	for (const auto& rUnmapped : i_rUnmapped)
+		list.push_back({{"name", i_rSkeleton[rUnmapped.m_Joint].m_Name}, {"reason", rUnmapped.m_Reason}});
+	return list;
+}
+
 } // namespace
 
 double ParseScore(const std::string& i_rWord)
@@ -127,6 +155,21 @@ void ApplyPreset(VSession& io_rSession, const std::string& i_rPath)
 		    rMisfit.m_Pair.m_Source, rMisfit.m_Pair.m_Target, rMisfit.m_Reason);
 	}
 	io_rSession.m_ReportJson["preset"] = {{"pairs", fit.m_Fitted.size()}, {"proposed", proposed}, {"missing", missing}};
+}
+
+VJson MappedToJson(const VMapped& i_rMapped)
+{
+	const SetupProposal::VProposal& rProposal = i_rMapped.m_Proposal;
+	VJson json{{"pairs", ToJson(rProposal.m_Pairs, i_rMapped)},
+	    {"alternatives", ToJson(rProposal.m_Alternatives, i_rMapped)},
+	    {"unmapped",
+	        {{"source", ToJson(rProposal.m_UnmappedSources, i_rMapped.m_Source)},
+	            {"target", ToJson(rProposal.m_UnmappedTargets, i_rMapped.m_Target)}}}};
+	if (!rProposal.m_NoBody.empty())
+		json["noBody"] = rProposal.m_NoBody;
+	if (i_rMapped.m_Root >= 0)
+		json["root"] = i_rMapped.m_Target[std::size_t(i_rMapped.m_Root)].m_Name;
+	return json;
 }
 
 } // namespace CommandLine

@@ -31,6 +31,9 @@ VMapped ProposeForFile(VSession& io_rSession, const std::optional<std::size_t>& 
 /// loaded.
 VMapped ProposeForSubject(VSession& io_rSession);
 
+/// As "map --json" prints it, but for how the two stand.
+VJson MappedToJson(const VMapped& i_rMapped);
+
 /// Adds the targets of all pairs that are proposed for the session's target subject, with their weights, and tells how
 /// many. EFindings if no pair scores enough.
 void AddProposedTargets(VSession& io_rSession);

@@ -20,10 +20,9 @@ using CoreOrlexTypes::VSubjectParametrised;
 VSubjectParametrised PerformerOf(const VTakeToPlay& i_rWhat, VSession& io_rSession, const TakeIO::VTake& i_rTake)
 {
 	if (!i_rWhat.m_Source.empty())
-	{
 		io_rSession.LoadSource(i_rWhat.m_Source);
+	if (io_rSession.Document().SourceValues().m_pParametrised)
 		return io_rSession.Source("posing it");
-	}
 	std::vector<TakeSolve::VFinding> findings;
 	auto record = TakeSolve::MakePerformer(i_rTake, StemOf(i_rWhat.m_Take), findings);
 	for (const TakeSolve::VFinding& rFinding : findings)
@@ -54,17 +53,25 @@ std::unique_ptr<const VPlayedTake> PlayTake(
     VSession& io_rSession, const VTakeToPlay& i_rWhat, const std::function<void(std::size_t, std::size_t)>& i_rProgress)
 {
 	const TakeSolve::VSourceSettings pairs = ReadPairs(*i_rWhat.m_pPairs);
-	const auto pTake = std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rWhat.m_Take, *i_rWhat.m_pTake));
-	const VSubjectParametrised performer = PerformerOf(i_rWhat, io_rSession, *pTake);
-	auto pPlayed = std::make_unique<VPlayedTake>(performer, io_rSession.Target(), pTake);
+	return PlayTake(io_rSession, i_rWhat,
+	    std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rWhat.m_Take, *i_rWhat.m_pTake)), pairs, i_rProgress);
+}
+
+std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
+    std::shared_ptr<const TakeIO::VTake> i_pTake, const TakeSolve::VSourceSettings& i_rPairs,
+    const std::function<void(std::size_t, std::size_t)>& i_rProgress)
+{
+	const VSubjectParametrised performer = PerformerOf(i_rWhat, io_rSession, *i_pTake);
+	auto pPlayed = std::make_unique<VPlayedTake>(performer, io_rSession.Target(), i_pTake);
 	RequireNoErrors();
 	const TakeSolve::VPosedSubject& rSource = pPlayed->m_Source;
 	const TakeSolve::VPosedSubject& rTarget = pPlayed->m_Target;
 	std::string error;
-	const auto pMotion = TakeSolve::VSourceMotion::Make(rSource.m_Subject, rSource.m_BindPose, pTake, pairs, error);
+	const auto pMotion =
+	    TakeSolve::VSourceMotion::Make(rSource.m_Subject, rSource.m_BindPose, i_pTake, i_rPairs, error);
 	if (!pMotion)
 		throw VCommandError(EWrongUsage, error);
-	const auto [first, last] = FramesOrRefuse(i_rWhat, pTake->m_Frames);
+	const auto [first, last] = FramesOrRefuse(i_rWhat, i_pTake->m_Frames);
 	if (rTarget.m_Subject.m_Targets.empty())
 		throw VCommandError(EBadInput, "\"" + i_rWhat.m_Subject + "\" has no targets: there is nothing to solve");
 	try

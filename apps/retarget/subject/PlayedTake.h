@@ -23,7 +23,7 @@ struct VTakeToPlay
 	/// The retarget subject as the command line names it, for messages.
 	std::string m_Subject;
 	std::string m_Take;
-	/// The performer's skeleton; empty: one is made of the take.
+	/// The performer's skeleton; empty: the session's, or where it has none one that is made of the take.
 	std::string m_Source;
 	std::shared_ptr<TakeIO::VTakeSettings> m_pTake = std::make_shared<TakeIO::VTakeSettings>();
 	std::shared_ptr<VPairSettings> m_pPairs = std::make_shared<VPairSettings>();
@@ -54,6 +54,10 @@ struct VPlayedTake
 /// Throws VCommandError where a file is no good, frames are none of the take's, or there is nothing to solve.
 /// @param i_rProgress called with the frames that are solved, and all of them
 std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
+    const std::function<void(std::size_t, std::size_t)>& i_rProgress = {});
+/// The same with a take and its pairs that are there already.
+std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
+    std::shared_ptr<const TakeIO::VTake> i_pTake, const TakeSolve::VSourceSettings& i_rPairs,
     const std::function<void(std::size_t, std::size_t)>& i_rProgress = {});
 
 } // namespace CommandLine

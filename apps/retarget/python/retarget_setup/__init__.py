@@ -173,6 +173,53 @@ class Kinematics(_core.Kinematics):
         return super().rotations(states)
 
 
+class Take(_core.Take):
+    """A recorded motion of a performer, from a BVH or FBX file.
+
+    What the file does not tell is guessed, and told as a warning: up is "y" or "z", unit the millimetres of one unit.
+    With rate it is brought to so many frames a second; stack names an animation stack of an FBX file.
+    """
+
+    def __init__(self, path, stack=None, up=None, unit=None, rate=None):
+        super().__init__(_os.fspath(path), stack, up, unit, rate)
+
+    def joints(self):
+        """Its joints, a list of (name, index of the parent or -1), parents first."""
+        return super().joints()
+
+    def joint_poses(self, first=0, last=None):
+        """World poses of its joints in the frames from first to last, (frames, joints, 4, 4)."""
+        return super().joint_poses(first, last)
+
+    def poses(self, source, first=0, last=None, joints=(), rest_frame=None):
+        """World poses of a performer's segments who moves by the take, (frames, segments, 4, 4).
+
+        source is the performer's SkeletonFile. Which joint drives which segment is told by names and shapes; joints adds
+        (joint, segment) to that. In rest_frame the performer stands as in the bind pose; without it the take's rest pose
+        counts.
+        """
+        return super().poses(source._parts(), first, last, list(joints), rest_frame)
+
+    def performer(self):
+        """A performer's skeleton made of the take, as SkeletonFile."""
+        return SkeletonFile._of(super().performer())
+
+
+@_dataclasses.dataclass(frozen=True, slots=True, eq=False)
+class Solved:
+    """A character that followed a take, frames from first on. Numpy arrays: states (frames, states), for Kinematics;
+    residuals (frames, targets), how far each is off, in mm and of rotations in radians, nan for one that is left out;
+    iterations and converged (frames,). report is what "retarget solve --json" prints."""
+
+    first: int
+    rate: float
+    states: "NDArray[np.float64]"
+    residuals: "NDArray[np.float64]"
+    iterations: "NDArray[np.uint32]"
+    converged: "NDArray[np.bool_]"
+    report: "dict[str, Any]"
+
+
 def _edits(edits):
     """Names with or without dashes, alone or with their values."""
     pairs = []
@@ -220,6 +267,22 @@ class Session:
         """A dict for each target, as "retarget targets --json" prints them; with a source its residuals in mm and
         degrees."""
         return self._session.targets()
+
+    def propose(self):
+        """Which segment of the source belongs to which of the retarget subject, a dict as "retarget map --json" prints
+        it: pairs with scores and reasons, alternatives, what is left over. The edit "auto" takes the pairs over."""
+        return self._session.propose()
+
+    def align(self, chains=(), lock=()):
+        """Brings the bind pose to the source's, as the edit "align" does: only some of "arms", "legs", "spine" and
+        "others" where chains are given, and never the segments in lock. Returns the angles before and after."""
+        self.edits([*(("chain", chain) for chain in chains), *(("lock", segment) for segment in lock), "align"])
+        return self.report["aligned"]
+
+    def solve(self, take, first=None, last=None, joints=(), rest_frame=None):
+        """The character follows a Take in the frames from first to last, a Solved. The source moves by it, or without
+        one a performer that is made of the take; joints and rest_frame as Take.poses has them."""
+        return Solved(*self._session.solve(take, first, last, list(joints), rest_frame))
 
     def check(self):
         """A list of Finding about the retarget subject."""
@@ -274,5 +337,5 @@ def edit_kinds():
     return _core.edit_kinds()
 
 
-__all__ = ["Error", "Finding", "Change", "Bone", "SkeletonFile", "Kinematics", "Session", "NO_PARENT", "NOT_SET", "read",
+__all__ = ["Error", "Finding", "Change", "Bone", "SkeletonFile", "Kinematics", "Take", "Solved", "Session", "NO_PARENT", "NOT_SET", "read",
            "compare", "bones", "create", "load", "edit_kinds", *_classes]
