@@ -146,6 +146,7 @@ TEST_F(Steps, OfEveryKindInAnyOrderGiveTheBytesOfASave)
 				choice.m_bArms = a % 3 != 0;
 				choice.m_bOthers = a % 5 != 0;
 				choice.m_bFeetWithShins = a % 2 == 0;
+				choice.m_bFitScale = a % 3 == 1;
 				if (b % 2 == 0)
 					choice.m_Locked = {std::size_t(b) / 4, std::size_t(b) / 3};
 				m_Document.AlignToSource(choice, std::uint64_t(a));

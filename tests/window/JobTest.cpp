@@ -6,6 +6,7 @@
 #include "studio/host/Services.h"
 
 #include <QApplication>
+#include <QCheckBox>
 #include <QClipboard>
 #include <QComboBox>
 #include <QFile>
@@ -13,6 +14,7 @@
 #include <QLabel>
 #include <QProcess>
 #include <QQuickItem>
+#include <QRegularExpression>
 #include <QStyleHints>
 #include <QTableWidget>
 #include <QTest>
@@ -533,6 +535,12 @@ TEST_F(Job, AlignsToTheSourceWithAPreview)
 	align();
 	press("AlignToSource", "AlignLegs");
 	press("AlignToSource", "AlignLegs");
+	const auto scaleBox = [this] { return m_pWindow->findChild<QCheckBox*>("AlignFitScale"); };
+	EXPECT_TRUE(scaleBox()->isChecked() && scaleBox()->isEnabled());
+	press("AlignToSource", "AlignFitScale");
+	EXPECT_FALSE(scaleBox()->isChecked());
+	press("AlignToSource", "AlignFitScale");
+	const QString scale = QRegularExpression("by ([0-9.]+),").match(scaleBox()->text()).captured(1);
 	{
 		auto& rDialog = *m_pWindow->findChild<QWidget*>("AlignToSource");
 		auto& rTable = *rDialog.findChild<QTableWidget*>("AlignedJoints");
@@ -558,7 +566,8 @@ TEST_F(Job, AlignsToTheSourceWithAPreview)
 	rOperator.AnswerDialog(File("aligned.qrr"));
 	EXPECT_EVENTUALLY(QFile::exists(File("aligned.qrr")));
 	EXPECT_TRUE(Content("aligned.qrr")
-	    == CommandLine({"edit", File("before.qrr"), "--source", File("performer.qrs"), "--align"}));
+	    == CommandLine({"edit", File("before.qrr"), "--source", File("performer.qrs"), "--root-height", "scale",
+	        "--scale", scale, "--align"}));
 	// The steps give the file again.
 	rOperator.AnswerNextDialog(File("steps.json"));
 	rOperator.ChooseInMenu("EditMenu", "SaveRecipe");

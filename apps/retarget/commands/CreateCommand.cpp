@@ -31,6 +31,7 @@ VCommand AddCreateCommand(CLI::App& io_rProgram)
 	        "hero.qrr",
 	        "create --fbx rig.fbx --root 'Bip001 Pelvis' --scale 0.9 -o small.qrr"});
 	const auto pMaking = std::make_shared<VMaking>();
+	pMaking->m_bTyped = true;
 	const auto pOut = std::make_shared<VOutput>();
 	const auto pEdits = std::make_shared<VEdits>();
 	pApp->add_option("--fbx", pMaking->m_Fbx, "The character's FBX file")->option_text("FILE")->required();

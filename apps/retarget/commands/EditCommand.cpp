@@ -27,6 +27,7 @@ VCommand AddEditCommand(CLI::App& io_rProgram)
 	        "edit hero.qrr --weight 3=2.5 --remove-target 0 -o hero.qrr",
 	        "edit hero.qrr --source performer.qrs --pose LeftArm=0,0,-1.2 --update-targets -o posed.qrr"});
 	const auto pMaking = std::make_shared<VMaking>();
+	pMaking->m_bTyped = true;
 	const auto pOut = std::make_shared<VOutput>();
 	const auto pEdits = std::make_shared<VEdits>();
 	pApp->add_option("IN.qrr", pMaking->m_Subject, "The retarget subject, or a legacy one (.qrx); - is standard input")

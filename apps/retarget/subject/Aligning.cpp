@@ -32,6 +32,14 @@ double Rounded(double i_Value, int i_Decimals)
 	return std::round(unit * i_Value) / unit + 0.0;
 }
 
+/// What the target subject was scaled by before, and why.
+std::string ScaleText(const SetupProposal::VPoseFinding& i_rFinding, double i_Scale)
+{
+	return i_rFinding.m_Message + ": it is scaled by " + Shortest(SetupProposal::SuggestedScale(i_rFinding))
+	    + ", as --root-height scale --scale " + Shortest(i_Scale)
+	    + " before --align does; --scale keep leaves its size";
+}
+
 VJson ToJson(
     const VAlignment& i_rAlignment, const VSubjectParametrised& i_rSource, const VSubjectParametrised& i_rTarget)
 {
@@ -122,17 +130,27 @@ void AlignTarget(VSession& io_rSession)
 {
 	const VSubjectParametrised& rSource = io_rSession.Source("--align");
 	VRetargetSetupCore& rDocument = io_rSession.Document();
+	RetargetSetup::VAlignmentChoice choice = io_rSession.m_Alignment;
+	choice.m_bFitScale = io_rSession.m_bFitsScale && rDocument.GetTargetScale() == 1.0;
 	const bool bFromFile = !io_rSession.m_Alignment.m_bAsItStands && rDocument.AlignsFromFilePose();
-	const auto aligned = rDocument.AlignToSource(io_rSession.m_Alignment);
+	const auto aligned = rDocument.AlignToSource(choice);
 	if (!aligned)
 		throw VCommandError(EBadInput, "--align: " + io_rSession.WhyIgnored());
 	if (bFromFile)
 		io_rSession.TookFilePose();
 	const VSubjectParametrised& rTarget = io_rSession.Target();
-	for (const auto& rChain : aligned->m_Refused)
+	const VAlignment& rAlignment = aligned->m_Alignment;
+	for (const auto& rChain : rAlignment.m_Refused)
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "--align: the %1% stays as it is: %2%", rChain.m_Chain, rChain.m_Reason);
-	io_rSession.m_ReportJson["aligned"] = ToJson(*aligned, rSource, rTarget);
-	io_rSession.m_ReportText += ToText(*aligned, rSource, rTarget);
+	io_rSession.m_ReportJson["aligned"] = ToJson(rAlignment, rSource, rTarget);
+	io_rSession.m_ReportText += ToText(rAlignment, rSource, rTarget);
+	if (aligned->m_bScaled)
+	{
+		const std::string text = ScaleText(*aligned->m_Scale, rDocument.GetTargetScale());
+		NVX_LOG(c_pCategory, NVX::ELogInformation, "%1%", text);
+		io_rSession.m_ReportJson["aligned"]["scaledBy"] = SetupProposal::SuggestedScale(*aligned->m_Scale);
+		io_rSession.m_ReportText += text + "\n";
+	}
 	io_rSession.m_bAligned = true;
 }
 

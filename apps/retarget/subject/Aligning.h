@@ -27,7 +27,8 @@ void UnlockSegment(VSession& io_rSession, const std::string& i_rSegment);
 void AlignAsItStands(VSession& io_rSession, const std::string&);
 
 /// "--align": with the angles before and after in what the session reports. Chains that would stand worse stay, which
-/// is a warning. A subject that stands as it was made takes the pose of its FBX file first.
+/// is a warning. A subject that stands as it was made takes the pose of its FBX file first, and where the session fits
+/// scales, the size of the source, which is reported.
 void AlignTarget(VSession& io_rSession);
 
 /// After all edits: how the two stand, into what the session reports, if it was aligned.

@@ -212,6 +212,8 @@ void SetExpressions(VSession& io_rSession, const std::string& i_rValue)
 
 void SetScale(VSession& io_rSession, const std::string& i_rValue)
 {
+	if (i_rValue == "keep")
+		return;
 	const double scale = i_rValue == "fit" ? ScaleThatFits(io_rSession) : ParseFinite(i_rValue, "--scale");
 	if (!(scale > 0.0))
 		throw VCommandError(EWrongUsage, "--scale: a scale must be above 0: " + i_rValue);
@@ -321,6 +323,15 @@ void UpdateTargets(VSession& io_rSession, const std::string&)
 	io_rSession.Document().UpdateTargets();
 }
 
+void MeasureAgain(VSession& io_rSession)
+{
+	io_rSession.Document().UpdateTargets();
+	constexpr const char* c_pText =
+	    "The offsets that --auto measured were measured again at the new scale, as --update-targets does";
+	NVX_LOG(c_pCategory, NVX::ELogInformation, "%1%", c_pText);
+	io_rSession.m_ReportText += std::string(c_pText) + "\n";
+}
+
 constexpr const char* c_pEditsGroup = "Edits, run in the order given";
 
 constexpr VEditKind c_Kinds[] = {
@@ -361,9 +372,10 @@ constexpr VEditKind c_Kinds[] = {
         "Give target N the offset X,Y,Z as the fields of the panel take it: an angle may be an expression, and what is "
         "left empty stays",
         SetExpressions},
-    {"--scale", "S",
+    {"--scale", "S|fit|keep",
         "Scale all lengths of the target subject: 1 is the size in the file, fit brings the hips to the height of the "
-        "source's",
+        "source's, keep leaves it. Where neither this nor --root-height is given, --auto with --align fits it, and the "
+        "height of the root, if hips differ by more than 2 %",
         SetScale},
     {"--switch-root-height", "keep|scale",
         "From here on, and at once, what the scale does to the height of the root above the floor, as --root-height",
@@ -557,6 +569,19 @@ bool TakesProposal(const VEdits& i_rEdits)
 	    });
 }
 
+bool LeavesScale(const VEdits& i_rEdits)
+{
+	const auto has = [&](auto* i_pApply, bool i_bTyped)
+	{
+		return std::ranges::any_of(i_rEdits,
+		    [&](const VEdit& i_rEdit) {
+			    return i_rEdit.m_pKind && i_rEdit.m_pKind->m_pApply == i_pApply
+			        && (!i_bTyped || i_rEdit.m_Where.empty());
+		    });
+	};
+	return has(Auto, true) && has(Align, true) && !has(SetScale, false) && !has(SwitchRootHeight, false);
+}
+
 void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord)
 {
 	io_rApp
@@ -570,8 +595,12 @@ void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord)
 
 void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
 {
+	bool bMeasured = false;
 	for (const VEdit& rEdit : i_rEdits)
 	{
+		const auto is = [&](auto* i_pApply) { return rEdit.m_pKind && rEdit.m_pKind->m_pApply == i_pApply; };
+		bMeasured = (bMeasured || is(Auto)) && !is(SetState) && !is(SetExpressions);
+		const double scale = io_rSession.Document().GetTargetScale();
 		try
 		{
 			if (rEdit.m_pKind)
@@ -583,6 +612,9 @@ void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
 		{
 			throw VCommandError(rError.Status(), rEdit.m_Where + rError.what());
 		}
+		if (bMeasured && io_rSession.m_bOffsetsFollowScale && io_rSession.Document().GetTargetScale() != scale
+		    && !is(Align))
+			MeasureAgain(io_rSession);
 		io_rSession.Settle();
 	}
 	TellExpressionsAgain(io_rSession.Document());

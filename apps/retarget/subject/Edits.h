@@ -54,6 +54,9 @@ void AddEditOptions(CLI::App& io_rApp, const std::shared_ptr<VEdits>& i_rpEdits,
 /// Whether one of them looks at what is proposed, which needs a source, and the root that the body hangs on.
 bool TakesProposal(const VEdits& i_rEdits);
 
+/// Whether --auto and --align stand on the command line itself, and nothing tells of the scale: then it is left open.
+bool LeavesScale(const VEdits& i_rEdits);
+
 /// "--root-height", which is no edit: it counts for all of them.
 /// @param o_rWord must outlive the parsing.
 void AddRootHeightOption(CLI::App& io_rApp, std::string& o_rWord);

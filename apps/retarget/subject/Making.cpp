@@ -12,6 +12,8 @@ namespace CommandLine
 void MakeSubject(VSession& io_rSession, const VMaking& i_rMaking, const VEdits& i_rEdits)
 {
 	io_rSession.Document().SetScaleRootHeight(i_rMaking.m_RootHeight == c_pScaleRootHeight);
+	io_rSession.m_bFitsScale = i_rMaking.m_bTyped && i_rMaking.m_RootHeight.empty() && LeavesScale(i_rEdits);
+	io_rSession.m_bOffsetsFollowScale = i_rMaking.m_bTyped;
 	const auto loadSource = [&]
 	{
 		if (!i_rMaking.m_Source.empty())

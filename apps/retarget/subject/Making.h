@@ -17,8 +17,10 @@ struct VMaking
 	/// The performer's skeleton; empty for none.
 	std::string m_Source;
 	std::optional<std::string> m_Root;
-	/// "--root-height".
-	std::string m_RootHeight = "keep";
+	/// "--root-height"; empty, which is "keep", where it is not given.
+	std::string m_RootHeight;
+	/// An operator typed the edits: what is left open is chosen for the best, and told. Texts and programs say it all.
+	bool m_bTyped = false;
 };
 
 /// Reads the files and runs the edits. Throws VCommandError to fail.

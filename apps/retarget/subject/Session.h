@@ -91,6 +91,10 @@ public:
 	/// What an alignment reaches.
 	RetargetSetup::VAlignmentChoice m_Alignment;
 	bool m_bAligned = false;
+	/// An alignment scales a target subject that has the size of its file to the source's, where they differ.
+	bool m_bFitsScale = false;
+	/// Offsets that --auto has measured are measured again at each scale, as long as nobody has given one.
+	bool m_bOffsetsFollowScale = false;
 	/// What edits add to the report.
 	VJson m_ReportJson = VJson::object();
 	std::string m_ReportText;

@@ -235,6 +235,11 @@ VCandidates PresetActions(const VTyped&, const std::string&)
 	return Words({"save"});
 }
 
+VCandidates ScaleWords(const VTyped&, const std::string&)
+{
+	return Words({"fit", "keep"});
+}
+
 /// By what a value is called in the help.
 struct VValue
 {
@@ -281,7 +286,7 @@ constexpr VValue c_Values[] = {
     {"OUT.qrs", Files},
     {"OUT.svg", Files},
     {"RECIPE.json", Files},
-    {"S", Nothing},
+    {"S|fit|keep", ScaleWords},
     {"SCORE", Nothing},
     {"SEG=RX,RY,RZ[,TX,TY,TZ]", TargetSegment},
     {"SEGMENT", TargetSegment},

@@ -370,12 +370,13 @@ void VRetargetPanel::AddTargets(const QVariantList& i_rTargets)
 	QMetaObject::invokeMethod(m_pDocument, "AddTargets", Q_ARG(QVariantList, i_rTargets));
 }
 
-QVariantMap VRetargetPanel::AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked)
+QVariantMap VRetargetPanel::AlignToSource(
+    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale)
 {
 	ApplyTyped();
 	QVariantMap aligned;
 	QMetaObject::invokeMethod(m_pDocument, "AlignToSource", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, aligned),
-	    Q_ARG(QVariantList, i_rChains), Q_ARG(QVariantList, i_rLocked));
+	    Q_ARG(QVariantList, i_rChains), Q_ARG(QVariantList, i_rLocked), Q_ARG(bool, i_bFitScale));
 	return aligned;
 }
 

@@ -94,7 +94,7 @@ public:
 	/// In one step.
 	void AddTargets(const QVariantList& i_rTargets);
 	// The document's functions of these names.
-	QVariantMap AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked);
+	QVariantMap AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale);
 	bool IsAligning() const;
 	void EndAlignment(bool i_bKeep);
 	QVariantMap LookAtRebind(bool i_bPerformer) const;

@@ -11,6 +11,7 @@
 #include <QHBoxLayout>
 #include <QHeaderView>
 #include <QLabel>
+#include <QLocale>
 #include <QPushButton>
 #include <QSignalBlocker>
 #include <QTableWidget>
@@ -48,6 +49,7 @@ VAlignDialog::VAlignDialog(
     VRetargetPanel& i_rPanel, TesselPluginInterface::ISelection& io_rSelection, QWidget* i_pParent)
     : QDialog(i_pParent), m_rPanel(i_rPanel), m_rSelection(io_rSelection), m_Before(io_rSelection.Items()),
       m_Sources(i_rPanel.SourceSegments()), m_Targets(i_rPanel.TargetSegments()),
+      m_pFitScale(Named(new QCheckBox, "AlignFitScale", tr("Scale to the performer"))),
       m_pTable(Named(new QTableWidget(0, EAlignColumnCount), "AlignedJoints", tr("Angles before and after"))),
       m_pNote(Named(new QLabel, "AlignNote", tr("What was done")))
 {
@@ -82,6 +84,8 @@ VAlignDialog::VAlignDialog(
 		m_Chains.push_back(pBox);
 	}
 	pChains->addStretch();
+	m_pFitScale->setChecked(true);
+	connect(m_pFitScale, &QCheckBox::clicked, this, &VAlignDialog::Align);
 	auto* const pButtons = Named(
 	    new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel), "AlignButtons", tr("Keep or leave"));
 	Named(pButtons->button(QDialogButtonBox::Ok), "AlignKeep", tr("Keep this pose"))->setText(tr("&Keep This Pose"));
@@ -97,6 +101,7 @@ VAlignDialog::VAlignDialog(
 	    });
 	auto* const pLayout = new QVBoxLayout(this);
 	pLayout->addLayout(pChains);
+	pLayout->addWidget(m_pFitScale);
 	pLayout->addWidget(m_pTable, 1);
 	pLayout->addWidget(m_pNote);
 	pLayout->addWidget(pButtons);
@@ -113,7 +118,7 @@ bool VAlignDialog::Align()
 	for (const int segment : m_Locked)
 		locked << segment;
 	m_bAtWork = true;
-	const QVariantMap aligned = m_rPanel.AlignToSource(chains, locked);
+	const QVariantMap aligned = m_rPanel.AlignToSource(chains, locked, m_pFitScale->isChecked());
 	m_bAtWork = false;
 	const QVariantList joints = aligned["joints"].toList();
 	{
@@ -124,6 +129,7 @@ bool VAlignDialog::Align()
 	}
 	for (int column = 0; column < EAlignNote; ++column)
 		m_pTable->resizeColumnToContents(column);
+	ShowScale(aligned);
 	QStringList notes{tr("Angles between the directions of segments. Turned by %1 as a whole, moved by %2 mm along the "
 	                     "floor, lifted by %3 mm.")
 	                      .arg(Degrees(aligned["turn"].toDouble()))
@@ -133,6 +139,17 @@ bool VAlignDialog::Align()
 		notes << rRefused.toString();
 	m_pNote->setText(notes.join('\n'));
 	return !aligned.isEmpty();
+}
+
+void VAlignDialog::ShowScale(const QVariantMap& i_rAligned)
+{
+	const double scale = i_rAligned["scale"].toDouble();
+	const bool bToFit = !i_rAligned.isEmpty() && scale != 1.0;
+	m_pFitScale->setEnabled(bToFit);
+	m_pFitScale->setText(bToFit ? tr("S&cale the character by %1, so that its hips stand as high as the performer's")
+	                                  .arg(QLocale::c().toString(scale, 'g', 4))
+	                            : tr("S&cale the character: its hips stand as high as the performer's"));
+	m_pFitScale->setToolTip(PlainToolTip(i_rAligned["heights"].toString()));
 }
 
 void VAlignDialog::ShowJoint(int i_Row, const QVariantMap& i_rJoint)

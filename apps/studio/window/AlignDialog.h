@@ -40,6 +40,7 @@ public:
 	void done(int i_Result) override;
 
 private:
+	void ShowScale(const QVariantMap& i_rAligned);
 	void ShowJoint(int i_Row, const QVariantMap& i_rJoint);
 	void LockTicked();
 	void SelectPair();
@@ -50,6 +51,8 @@ private:
 	const QStringList m_Sources;
 	const QStringList m_Targets;
 	std::vector<QCheckBox*> m_Chains;
+	/// Whether the character is scaled to the performer; on at first.
+	QCheckBox* const m_pFitScale;
 	/// Segments of the character that keep their joints.
 	std::set<int> m_Locked;
 	QTableWidget* const m_pTable;

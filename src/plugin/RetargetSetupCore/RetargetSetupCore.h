@@ -115,7 +115,7 @@ public:
 	/// A subject that stands as it was made takes the pose of its FBX file first.
 	/// @param i_Way what several tries are one step by, see VEdit.
 	/// @return how it was brought there; nothing if there is no change.
-	std::optional<SetupProposal::VAlignment> AlignToSource(
+	std::optional<RetargetSetup::VAlignedToSource> AlignToSource(
 	    const RetargetSetup::VAlignmentChoice& i_rChoice, std::uint64_t i_Way = 0);
 
 	/// Each joint that there still is stands as it did when the subject was made or loaded, and not as in its FBX file.
@@ -283,8 +283,19 @@ protected:
 	/// @return whether the whole file was written.
 	bool SaveTargetSubjectBy(const char* i_pCommand, const boost::filesystem::path& i_rPath);
 
-	/// Several edits as one step.
-	void RunStep(const char* i_pName, const std::function<void()>& i_rEdits);
+	/// What an alignment changes.
+	struct VPosedTarget
+	{
+		std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pSubject;
+		double m_NextScale = 1.0;
+		bool m_bScaleRootHeight = false;
+	};
+	VPosedTarget PosedTarget() const;
+	/// It is as it was before several tries, which are one step by the edit's way.
+	void Restore(const VPosedTarget& i_rBefore, const RetargetSetup::VEdit& i_rEdit);
+
+	/// Several edits as one step, which recipes have as those of them that they know by a command of their own.
+	void RunStep(const RetargetSetup::VEdit& i_rEdit, const std::function<void()>& i_rEdits);
 
 	// What whoever shows the document tells on. Here they do nothing.
 
@@ -318,15 +329,22 @@ private:
 	class VStep
 	{
 	public:
-		VStep(VRetargetSetupCore& io_rDocument, const RetargetSetup::VEdit& i_rEdit);
+		/// @param i_bGathers its commands are those of the edits within it, if each has some.
+		VStep(VRetargetSetupCore& io_rDocument, const RetargetSetup::VEdit& i_rEdit, bool i_bGathers = false);
 		~VStep();
 		VStep(const VStep&) = delete;
 		VStep& operator=(const VStep&) = delete;
 
 	private:
+		void Begin();
+
 		VRetargetSetupCore& m_rDocument;
-		const RetargetSetup::VEdit m_Edit;
-		const bool m_bOutermost;
+		RetargetSetup::VEdit m_Edit;
+		/// Null for the outermost.
+		VStep* const m_pAround;
+		const bool m_bGathers;
+		/// An edit within it is known by no command.
+		bool m_bUnknown = false;
 		bool m_bGoesOn = false;
 		std::optional<RetargetSetup::VTargetState> m_Before;
 	};
@@ -397,6 +415,14 @@ private:
 	/// @return nothing, with the reason, where it cannot take it.
 	std::optional<CoreOrlexTypes::VSubjectParametrised> InFilePose(const char*& o_rpReason) const;
 	bool StandsAsMade() const;
+	/// What AlignToSource makes of the target subject at its present scale, with the commands that a recipe has for it.
+	/// Nothing, and the command is ignored, if nothing can be aligned.
+	struct VAlignedEdit
+	{
+		RetargetSetup::VAligned m_Aligned;
+		RetargetSetup::VEdit m_Edit;
+	};
+	std::optional<VAlignedEdit> Aligned(const RetargetSetup::VAlignmentChoice& i_rChoice);
 	void UpdatePoseNote();
 	/// What the root's height is multiplied by at a scale.
 	double RootFactor(double i_Scale) const { return ScaleRootHeight() ? i_Scale : 1.0; }
@@ -439,7 +465,8 @@ private:
 	std::shared_ptr<TesselPluginInterface::ISelectionManager> m_pSelection;
 	NVX::VSignal<> m_LeavingSignal;
 	/// Within a step.
-	bool m_bInStep = false;
+	/// The innermost that is on its way.
+	VStep* m_pStep = nullptr;
 	bool m_bForgotTold = false;
 
 	std::unique_ptr<const ComputeSubject::VComputeSubjectFK> m_pSourceFK;

@@ -29,11 +29,23 @@ using RetargetSetup::VSessionStep;
 using RetargetSetup::VTargetFile;
 using RetargetSetup::VTargetState;
 
-VRetargetSetupCore::VStep::VStep(VRetargetSetupCore& io_rDocument, const VEdit& i_rEdit)
-    : m_rDocument(io_rDocument), m_Edit(i_rEdit), m_bOutermost(!std::exchange(io_rDocument.m_bInStep, true))
+VRetargetSetupCore::VStep::VStep(VRetargetSetupCore& io_rDocument, const VEdit& i_rEdit, bool i_bGathers)
+    : m_rDocument(io_rDocument), m_Edit(i_rEdit), m_pAround(io_rDocument.m_pStep), m_bGathers(i_bGathers)
 {
-	if (!m_bOutermost || !m_rDocument.m_History)
-		return;
+	if (!m_pAround && m_rDocument.m_History)
+		Begin();
+	if (m_pAround && m_pAround->m_bGathers)
+	{
+		auto& rCommands = m_pAround->m_Edit.m_Commands;
+		rCommands.insert(rCommands.end(), m_Edit.m_Commands.begin(), m_Edit.m_Commands.end());
+		m_pAround->m_bUnknown = m_pAround->m_bUnknown || m_Edit.m_Commands.empty();
+	}
+	// From where on nothing throws, and the end is sure to come.
+	m_rDocument.m_pStep = this;
+}
+
+void VRetargetSetupCore::VStep::Begin()
+{
 	m_bGoesOn = m_rDocument.m_History->GoesOn(m_Edit);
 	if (m_bGoesOn)
 		return;
@@ -46,8 +58,9 @@ VRetargetSetupCore::VStep::VStep(VRetargetSetupCore& io_rDocument, const VEdit& 
 
 VRetargetSetupCore::VStep::~VStep()
 {
-	if (m_bOutermost)
-		m_rDocument.m_bInStep = false;
+	m_rDocument.m_pStep = m_pAround;
+	if (m_bUnknown)
+		m_Edit.m_Commands.clear();
 	try
 	{
 		if (m_bGoesOn && m_rDocument.m_Target.m_pSteps)
@@ -69,13 +82,10 @@ VRetargetSetupCore::VStep::~VStep()
 	}
 }
 
-void VRetargetSetupCore::RunStep(const char* i_pName, const std::function<void()>& i_rEdits)
+void VRetargetSetupCore::RunStep(const VEdit& i_rEdit, const std::function<void()>& i_rEdits)
 {
-	const VStep step(*this, {i_pName});
+	const VStep step(*this, i_rEdit, true);
 	i_rEdits();
-	// What recipes know of the single ones they do not know of all.
-	if (m_Target.m_pSteps)
-		BeginSession({});
 }
 
 void VRetargetSetupCore::BeginSession(RetargetSetup::VBeginning i_Beginning)

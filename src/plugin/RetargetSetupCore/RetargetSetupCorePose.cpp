@@ -4,6 +4,7 @@
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "DebugServices/GlobalLog.h"
 #include "RetargetSetupCore/FilePose.h"
+#include "RetargetSetupCore/GlobalScale.h"
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/RestSkeletons.h"
@@ -20,6 +21,7 @@
 #include <locale>
 #include <numbers>
 #include <span>
+#include <utility>
 
 using CoreOrlexTypes::VSubjectParametrised;
 using RetargetSetup::c_LogCategory;
@@ -106,8 +108,8 @@ bool VRetargetSetupCore::AlignsFromFilePose() const
 	return StandsAsMade() && DifferenceFromFile() && RetargetSetup::HoldsFilePose(*TargetValues().m_pParametrised);
 }
 
-std::optional<SetupProposal::VAlignment> VRetargetSetupCore::AlignToSource(
-    const RetargetSetup::VAlignmentChoice& i_rChoice, std::uint64_t i_Way)
+std::optional<VRetargetSetupCore::VAlignedEdit> VRetargetSetupCore::Aligned(
+    const RetargetSetup::VAlignmentChoice& i_rChoice)
 {
 	constexpr const char* c_Command = "AlignToSource";
 	const std::optional<VBothPosed> both = BothPosed(c_Command);
@@ -116,7 +118,6 @@ std::optional<SetupProposal::VAlignment> VRetargetSetupCore::AlignToSource(
 	const VSubjectValues& source = both->m_Source;
 	VSubjectValues target = both->m_Target;
 	RetargetSetup::VEdit edit = RetargetSetup::AlignmentEdit(i_rChoice, *target.m_pParametrised);
-	edit.m_Way = i_Way;
 	if (!i_rChoice.m_bAsItStands && AlignsFromFilePose())
 	{
 		NVX_LOG(c_LogCategory, NVX::ELogInformation, "Aligning begins with the pose of the FBX file");
@@ -139,8 +140,55 @@ std::optional<SetupProposal::VAlignment> VRetargetSetupCore::AlignToSource(
 		CommandIgnored(c_Command, reason);
 		return std::nullopt;
 	}
-	SetTargetSubjectParametrised(std::move(aligned->m_Subject), edit);
-	return std::move(aligned->m_Alignment);
+	return VAlignedEdit{std::move(*aligned), std::move(edit)};
+}
+
+std::optional<RetargetSetup::VAlignedToSource> VRetargetSetupCore::AlignToSource(
+    const RetargetSetup::VAlignmentChoice& i_rChoice, std::uint64_t i_Way)
+{
+	auto made = Aligned(i_rChoice);
+	if (!made)
+		return std::nullopt;
+	RetargetSetup::VAlignedToSource told;
+	const VSubjectValues source = SourceValues();
+	const VSubjectParametrised& rAligned = made->m_Aligned.m_Subject;
+	CoreOrlexTypes::VSubject converted;
+	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(rAligned, converted);
+	told.m_Scale = RetargetSetup::ScaleFinding(*source.m_pParametrised, *source.m_pSubject, rAligned, converted);
+	const double scale = told.m_Scale ? GetTargetScale() * SetupProposal::SuggestedScale(*told.m_Scale) : 0.0;
+	told.m_bScaled = i_rChoice.m_bFitScale && told.m_Scale && !told.m_Scale->m_bFine
+	    && RetargetSetup::IsUsableScale(scale) && RetargetSetup::LostParameters(rAligned).empty();
+	RunStep({RetargetSetup::Steps::c_Align, i_Way},
+	    [&]
+	    {
+		    if (told.m_bScaled)
+		    {
+			    SetScaleRootHeight(true);
+			    SetTargetScale(scale);
+			    made = Aligned(i_rChoice);
+		    }
+		    if (made)
+			    SetTargetSubjectParametrised(std::move(made->m_Aligned.m_Subject), made->m_Edit);
+	    });
+	if (!made)
+		return std::nullopt;
+	told.m_Alignment = std::move(made->m_Aligned.m_Alignment);
+	return told;
+}
+
+VRetargetSetupCore::VPosedTarget VRetargetSetupCore::PosedTarget() const
+{
+	return {TargetValues().m_pParametrised, m_Target.m_NextScale, m_Target.m_bScaleRootHeight};
+}
+
+void VRetargetSetupCore::Restore(const VPosedTarget& i_rBefore, const RetargetSetup::VEdit& i_rEdit)
+{
+	const VStep step(*this, i_rEdit);
+	const bool bScaleRootHeight = std::exchange(m_Target.m_bScaleRootHeight, i_rBefore.m_bScaleRootHeight);
+	m_Target.m_NextScale = i_rBefore.m_NextScale;
+	SetTargetSubjectParametrised(*i_rBefore.m_pSubject);
+	if (bScaleRootHeight != i_rBefore.m_bScaleRootHeight)
+		ScaleRootHeightChanged();
 }
 
 void VRetargetSetupCore::SetScaleRootHeight(bool i_bScale)

@@ -88,6 +88,18 @@ void TurnJoint(VJoint& io_rJoint, const VMatrix3& i_rBase, const VMatrix3& i_rCa
 
 } // namespace
 
+std::optional<SetupProposal::VPoseFinding> ScaleFinding(const VSubjectParametrised& i_rSourceParametrised,
+    const VSubject& i_rSource, const VSubjectParametrised& i_rTargetParametrised, const VSubject& i_rTarget)
+{
+	const auto source = RestOf(i_rSourceParametrised, i_rSource);
+	const auto target = RestOf(i_rTargetParametrised, i_rTarget);
+	for (SetupProposal::VPoseFinding& rFinding :
+	    SetupProposal::CheckPose(source, target, SetupProposal::Propose(source, target)))
+		if (std::string_view(rFinding.m_pId) == "scale")
+			return std::move(rFinding);
+	return std::nullopt;
+}
+
 std::optional<VAligned> AlignToSource(const VSubjectParametrised& i_rSourceParametrised, const VSubject& i_rSource,
     const VSubjectParametrised& i_rTargetParametrised, const VSubject& i_rTarget, const VAlignmentChoice& i_rChoice,
     std::string& o_rReason)

@@ -3,6 +3,7 @@
 #include "CoreOrlexTypes/Subject.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "SetupProposal/Alignment.h"
+#include "SetupProposal/PoseCheck.h"
 
 #include <cstddef>
 #include <optional>
@@ -24,6 +25,9 @@ struct VAlignmentChoice
 	bool m_bFeetWithShins = false;
 	/// The document begins with no other pose than the one that stands there.
 	bool m_bAsItStands = false;
+	/// The document first scales the target, with the height of its root, so that its hips come to stand as high above
+	/// its feet as the source's. What differs by little stays.
+	bool m_bFitScale = false;
 	/// Segments of the target whose joints stay as they are.
 	std::set<std::size_t> m_Locked;
 };
@@ -36,6 +40,21 @@ struct VAligned
 	/// Which joints were turned, by how much, and which chains were refused.
 	SetupProposal::VAlignment m_Alignment;
 };
+
+/// What the document has to tell of an alignment.
+struct VAlignedToSource
+{
+	SetupProposal::VAlignment m_Alignment;
+	/// What the pose check tells of the scale that the target had, "scale"; nothing where hips or feet are not known.
+	std::optional<SetupProposal::VPoseFinding> m_Scale;
+	/// The target has the scale that it suggests.
+	bool m_bScaled = false;
+};
+
+/// Of two subjects, each converted from its parametrised one.
+std::optional<SetupProposal::VPoseFinding> ScaleFinding(
+    const CoreOrlexTypes::VSubjectParametrised& i_rSourceParametrised, const CoreOrlexTypes::VSubject& i_rSource,
+    const CoreOrlexTypes::VSubjectParametrised& i_rTargetParametrised, const CoreOrlexTypes::VSubject& i_rTarget);
 
 /// Brings each segment that a target ties to a source segment to where that points, see SetupProposal::Align. Only
 /// ball joints and the free joint of a root turn.

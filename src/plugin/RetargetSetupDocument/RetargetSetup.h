@@ -68,9 +68,14 @@ public:
 	/// first of several calls; all of them are one step.
 	/// @param i_rChains which are wanted: spine, arms, legs, others.
 	/// @param i_rLocked segments of the target subject whose joints stay.
+	/// @param i_bFitScale scales it first, with the height of its root, so that its hips come to stand as high as the
+	/// source's, where they do not.
 	/// @return "joints", a list of maps: "target", "source", "before", "after" in degrees, "note"; "turn" in degrees,
-	/// "lift" in mm, "refused", a list of sentences. Empty if there is no change, which commandIgnored tells.
-	Q_INVOKABLE QVariantMap AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked);
+	/// "move" and "lift" in mm, "refused", a list of sentences; "scale", what would fit or does, 1 where there is
+	/// nothing to fit, "scaled", and "heights", a sentence on hips. Empty if there is no change, which commandIgnored
+	/// tells.
+	Q_INVOKABLE QVariantMap AlignToSource(
+	    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale);
 	/// What it has made is still there.
 	Q_INVOKABLE bool IsAligning() const;
 	/// @param i_bKeep false: the pose before it comes back, unless the target subject has become another one since.
@@ -160,7 +165,7 @@ private:
 	boost::filesystem::path LocalPath(const char* i_pCommand, const QUrl& i_rFileURL);
 
 	/// Before and after what AlignToSource has done; null without it.
-	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pBeforeAlignment;
+	VPosedTarget m_BeforeAlignment;
 	std::shared_ptr<const CoreOrlexTypes::VSubjectParametrised> m_pAligned;
 	std::uint64_t m_Alignment = 0;
 	const std::shared_ptr<VRetargetSetupSegmentModel> m_pSourceSegmentModel;

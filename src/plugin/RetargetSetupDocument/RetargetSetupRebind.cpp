@@ -89,7 +89,7 @@ void VRetargetSetup::Rebind(bool i_bPerformer, bool i_bMeasure)
 	if (!rebound->m_Refusal.empty())
 		return CommandIgnored(c_Command, rebound->m_Refusal);
 	auto& rRecord = rebound->m_Setup.m_Record;
-	RunStep(RetargetSetup::Steps::c_Rebind,
+	RunStep({RetargetSetup::Steps::c_Rebind},
 	    [&]
 	    {
 		    if (SetTargetSubject(std::move(rRecord.m_SubjectParametrised), std::move(rRecord.m_SubjectApplicationData),

@@ -162,17 +162,19 @@ bool VRetargetSetup::IsAligning() const
 	return m_pAligned && TargetValues().m_pParametrised == m_pAligned;
 }
 
-QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked)
+QVariantMap VRetargetSetup::AlignToSource(
+    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale)
 {
 	if (IsAligning())
-		SetTargetSubjectParametrised(*m_pBeforeAlignment, {RetargetSetup::Steps::c_Align, m_Alignment});
+		Restore(m_BeforeAlignment, {RetargetSetup::Steps::c_Align, m_Alignment});
 	else
 	{
 		VRetargetSetupCore::EndStep();
 		++m_Alignment;
-		m_pBeforeAlignment = TargetValues().m_pParametrised;
+		m_BeforeAlignment = PosedTarget();
 	}
 	RetargetSetup::VAlignmentChoice choice;
+	choice.m_bFitScale = i_bFitScale;
 	choice.m_bSpine = i_rChains.value(0).toBool();
 	choice.m_bArms = i_rChains.value(1).toBool();
 	choice.m_bLegs = i_rChains.value(2).toBool();
@@ -181,28 +183,33 @@ QVariantMap VRetargetSetup::AlignToSource(const QVariantList& i_rChains, const Q
 	for (const QVariant& rSegment : i_rLocked)
 		if (const int segment = rSegment.toInt(); pTarget && segment >= 0 && segment < int(pTarget->m_Segments.size()))
 			choice.m_Locked.insert(std::size_t(segment));
-	const auto alignment = VRetargetSetupCore::AlignToSource(choice, m_Alignment);
+	const auto aligned = VRetargetSetupCore::AlignToSource(choice, m_Alignment);
 	m_pAligned = TargetValues().m_pParametrised;
-	if (!alignment)
+	if (!aligned)
 		return {};
+	const SetupProposal::VAlignment& rAlignment = aligned->m_Alignment;
 	const VSubjectValues source = SourceValues();
 	QVariantList joints;
-	for (const SetupProposal::VAlignedJoint& rJoint : alignment->m_Joints)
+	for (const SetupProposal::VAlignedJoint& rJoint : rAlignment.m_Joints)
 		joints << QVariantMap{{"target", int(rJoint.m_Target)}, {"source", int(rJoint.m_Source)},
 		    {"before", rJoint.m_Before}, {"after", rJoint.m_After}, {"note", QString::fromStdString(rJoint.m_Note)}};
 	QVariantList refused;
-	for (const SetupProposal::VRefusedChain& rChain : alignment->m_Refused)
+	for (const SetupProposal::VRefusedChain& rChain : rAlignment.m_Refused)
 		refused << QString("The %1 stays as it is: %2")
 		               .arg(QString::fromStdString(rChain.m_Chain), QString::fromStdString(rChain.m_Reason));
-	const Rotation::VVector3& rMove = alignment->m_MoveMm;
-	return {{"joints", joints}, {"refused", refused}, {"turn", alignment->m_TurnDegrees},
-	    {"move", std::hypot(rMove[0], rMove[1])}, {"lift", rMove[2]}};
+	const Rotation::VVector3& rMove = rAlignment.m_MoveMm;
+	const bool bToFit = aligned->m_Scale && !aligned->m_Scale->m_bFine;
+	return {{"joints", joints}, {"refused", refused}, {"turn", rAlignment.m_TurnDegrees},
+	    {"move", std::hypot(rMove[0], rMove[1])}, {"lift", rMove[2]}, {"scaled", aligned->m_bScaled},
+	    {"scale", bToFit ? SetupProposal::SuggestedScale(*aligned->m_Scale) : 1.0},
+	    {"heights", aligned->m_Scale ? QString::fromStdString(aligned->m_Scale->m_Message) : QString()}};
 }
 
 void VRetargetSetup::EndAlignment(bool i_bKeep)
 {
 	if (!i_bKeep && IsAligning())
-		SetTargetSubjectParametrised(*m_pBeforeAlignment, {RetargetSetup::Steps::c_Align, m_Alignment});
+		Restore(m_BeforeAlignment, {RetargetSetup::Steps::c_Align, m_Alignment});
 	VRetargetSetupCore::EndStep();
-	m_pBeforeAlignment = m_pAligned = nullptr;
+	m_BeforeAlignment = {};
+	m_pAligned = nullptr;
 }

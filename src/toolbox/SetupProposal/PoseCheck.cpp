@@ -6,6 +6,7 @@
 #include <cmath>
 #include <numbers>
 #include <optional>
+#include <string_view>
 
 namespace SetupProposal
 {
@@ -16,9 +17,13 @@ namespace
 constexpr double c_FineFacing = 20.0;
 constexpr double c_FineLimb = 12.0;
 constexpr double c_FineScale = 0.02;
-/// Where the lowest joint, of a toe or an ankle, stands over the floor.
-constexpr double c_FineAbove = 0.08;
+/// Where the lowest joint stands over the floor: a toe in a boot, or an ankle where there are no toes.
+constexpr double c_FineToeAbove = 0.11;
+constexpr double c_FineAnkleAbove = 0.15;
 constexpr double c_FineBelow = 0.02;
+
+/// Tenths of a millimetre of a leg.
+constexpr int c_ScaleDigits = 4;
 
 constexpr double c_Degrees = 180.0 / std::numbers::pi;
 
@@ -140,7 +145,8 @@ VPoseFinding Scale(double i_Source, double i_Target)
 	finding.m_Message = "The hips of the performer stand " + Rounded(i_Source, 1.0)
 	    + " mm over the lowest joint of the feet, those of the character " + Rounded(i_Target, 1.0) + " mm";
 	if (!finding.m_bFine)
-		finding.m_Options = "--root-height scale --scale " + Rounded(scale, 0.001) + " --update-targets";
+		finding.m_Options =
+		    "--root-height scale --scale " + NumberText::PrintShortest(SuggestedScale(finding)) + " --update-targets";
 	return finding;
 }
 
@@ -197,6 +203,20 @@ std::vector<VPoseFinding> CheckPose(
 	return findings;
 }
 
+double SuggestedScale(const VPoseFinding& i_rFinding)
+{
+	for (const auto& [pName, value] : i_rFinding.m_Numbers)
+		if (std::string_view(pName) == "scale")
+		{
+			std::string text;
+			NumberText::AppendG(text, value, c_ScaleDigits);
+			double scale = value;
+			NumberText::ScanReal(text, scale);
+			return scale;
+		}
+	return 1.0;
+}
+
 std::optional<std::size_t> LowestOfFeet(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody)
 {
 	std::optional<std::size_t> lowest;
@@ -214,8 +234,10 @@ double LiftToFloor(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody
 	const auto hips = VBody{i_rSkeleton, i_rBody}.HipHeight();
 	if (!hips)
 		return 0.0;
-	const double height = i_rSkeleton[*LowestOfFeet(i_rSkeleton, i_rBody)].m_Place[2];
-	return height <= c_FineAbove * *hips && height >= -c_FineBelow * *hips ? 0.0 : -height;
+	const std::size_t lowest = *LowestOfFeet(i_rSkeleton, i_rBody);
+	const double height = i_rSkeleton[lowest].m_Place[2];
+	const double fineAbove = i_rBody.m_Joints[lowest].m_Part == EToe ? c_FineToeAbove : c_FineAnkleAbove;
+	return height <= fineAbove * *hips && height >= -c_FineBelow * *hips ? 0.0 : -height;
 }
 
 } // namespace SetupProposal

@@ -28,6 +28,9 @@ struct VPoseFinding
 std::vector<VPoseFinding> CheckPose(
     const VRestSkeleton& i_rSource, const VRestSkeleton& i_rTarget, const VProposal& i_rProposal);
 
+/// What the character's scale is to be multiplied by, as the options of a finding "scale" have it; 1 for others.
+double SuggestedScale(const VPoseFinding& i_rFinding);
+
 /// The lowest joint of the feet; nothing without feet.
 std::optional<std::size_t> LowestOfFeet(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody);
 
