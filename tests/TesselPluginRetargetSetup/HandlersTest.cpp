@@ -5,6 +5,7 @@
 
 #include "OrlexGraphics/skins/SkinCache.h"
 #include "TesselDataStore/StoredValue.h"
+#include "TesselPluginRetargetSetup/FollowedFile.h"
 
 #include <QTest>
 
@@ -412,6 +413,18 @@ TEST_F(Handlers, AnFBXFileThatChangesOnDiskIsReadAgain)
 		EXPECT_EQ(Target().m_Segments[0].m_Name, "loin");
 		EXPECT_EQ(Type("TargetRoot", "2"), "");
 	}
+
+	// Chosen no more, as after the file was gone for a while.
+	Parameter("TargetFBX").ClearValue();
+	Run();
+	TakeLog();
+	bool bTold = false;
+	RetargetSetup::VFollowedFile same([&bTold] { bTold = true; });
+	same.Follow(QString::fromStdString(file.native()));
+	Put(file, heaps);
+	EXPECT_TRUE(WaitFor([&bTold] { return bTold; }, 60000));
+	Run();
+	EXPECT_EQ(TakeLog().find("has changed on disk"), std::string::npos);
 }
 
 TEST_F(Handlers, SourcesAreNeverLookedForWhereTheProcessRuns)

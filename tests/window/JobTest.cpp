@@ -654,6 +654,17 @@ TEST_F(Job, OffersToReBindToAChangedFileAndToAnotherPerformer)
 	EXPECT_TRUE(Content("second.qrr") == CommandLine({"rebind", File("rebound.qrr"), "--source", File("second.qrs")}));
 }
 
+TEST_F(Job, ClosesWhileTheSkinLoads)
+{
+	m_pOperator->Choose("SourceSkeleton", "performer");
+	m_pWindow->Open(File("character.fbx"));
+	EXPECT_EVENTUALLY(m_pOperator->Property("TargetRoot", "currentText").toString() == "haunch");
+	m_pOperator->Click("createTargetSubject");
+	m_pWindow.reset();
+	for (const QWidget* const pWidget : QApplication::topLevelWidgets())
+		EXPECT_FALSE(pWidget->isVisible()) << pWidget->metaObject()->className();
+}
+
 TEST_F(Job, ALegacyFileIsSavedUnderANewName)
 {
 	VOperator& rOperator = *m_pOperator;

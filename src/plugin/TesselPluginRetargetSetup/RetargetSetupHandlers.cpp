@@ -140,6 +140,8 @@ void VRetargetSetupWidget::OnTargetFBXChanged()
 	if (std::exchange(m_ChosenFBX, text) == text)
 		return;
 	m_UnreadFBX.clear();
+	// What is chosen no more is followed no more.
+	m_TargetFBXFile.Follow({});
 	UpdateRemarks();
 	if (!m_Parameters.m_pTargetFBX->HasValue())
 		return;
