@@ -81,7 +81,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i
 	stored.m_pSchema = bOwnSchema ? TakeSchema(input, 4) : TesselDataStore::SchemaOf<CoreOrlexTypes::VSubjectRecord>();
 	stored.m_Bytes = input;
 	(void)Skips(stored);
-	(void)TesselDataStore::ValueText(stored);
+	// A longer one only takes longer.
+	constexpr std::size_t c_MostText = 2000;
+	(void)TesselDataStore::ValueText(stored, c_MostText);
 	ReadAndWrite<CoreOrlexTypes::VSubjectRecord>(stored);
 	ReadAndWrite<CoreOrlexTypes::VSubjectParametrised>(stored);
 	ReadAndWrite<CoreOrlexTypes::VSubject>(stored);

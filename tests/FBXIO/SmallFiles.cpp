@@ -180,10 +180,15 @@ void Repack(VList& io_rRecords, std::mt19937& io_rRandom)
 	    [&](VTestValue& io_rValue)
 	    {
 		    const VNumbers numbers = NumbersOf(io_rValue);
-		    const std::pair<char, std::string> items[]{{'f', As<float>(numbers)}, {'d', As<double>(numbers)},
-		        {'i', As<std::int32_t>(numbers)}, {'l', As<std::int64_t>(numbers)}, {'b', As<std::int8_t>(numbers)},
-		        {'c', As<std::int8_t>(numbers)}, {'d', std::string(200'000, '\0')}};
-		    const auto& [type, bytes] = OneOf(items, io_rRandom);
+		    static constexpr char c_Types[]{'f', 'd', 'i', 'l', 'b', 'c', 'z'};
+		    const char kind = OneOf(c_Types, io_rRandom);
+		    const std::string bytes = kind == 'f' ? As<float>(numbers)
+		        : kind == 'd'                     ? As<double>(numbers)
+		        : kind == 'i'                     ? As<std::int32_t>(numbers)
+		        : kind == 'l'                     ? As<std::int64_t>(numbers)
+		        : kind == 'z'                     ? std::string(200'000, '\0')
+		                                          : As<std::int8_t>(numbers);
+		    const char type = kind == 'z' ? 'd' : kind;
 		    const std::size_t counts[]{
 		        numbers.size(), numbers.size(), numbers.size(), bytes.size() / 8, 0x7fffffff, 0x80000000, 0xffffffff};
 		    VRaw raw = PackedArray(type, OneOf(counts, io_rRandom), io_rRandom() % 3 != 0, bytes);

@@ -36,7 +36,8 @@ int Run(char** i_ppArguments)
 	const QUrl file = QUrl::fromLocalFile(QString::fromLocal8Bit(i_ppArguments[1]));
 	InMemoryHost::VPluginContext host;
 	VRetargetSetup document(host.GetDispatcher(), host.GetFrameFactory(), host.GetItemFactory());
-	document.KeepHistory(nullptr);
+	// Full before long.
+	document.KeepHistory(nullptr, std::size_t(8) << 20);
 	bool bSaved = false;
 	bool bLoaded = false;
 	bool bIgnored = false;
@@ -80,6 +81,7 @@ int Run(char** i_ppArguments)
 		Step([&] { document.LoadTargetSubjectURL(file); });
 		if (!bLoaded || bIgnored)
 			return CommandLine::EBadInput;
+		Step([&] { host.Dispatcher().RunPending(); });
 	}
 	return CommandLine::EFine;
 }

@@ -58,6 +58,7 @@ TEST(Usage, WrongWords)
 	        "\"none/x.log\" cannot be written: No such file or directory"},
 	    {"report and file", {"schema", "--json"}, 2, "",
 	        R"({"level":"error","category":"retarget","text":"--json reports on standard output, where -o - puts the )"},
+	    {"what a terminal would obey", {"eval", "1+\x1b[31m"}, 3, "", "Unexpected token \" \""},
 	    {"context", {"eval", "1", "--context", "cubic"}, 2, "",
 	        "--context: there is no \"cubic\"; give static, linear or full; see"},
 	    {"pose", {"fk", c_Performer, "--pose", "rest"}, 2, "", "there is no \"rest\""},

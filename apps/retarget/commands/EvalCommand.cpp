@@ -1,5 +1,6 @@
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Parsing.h"
+#include "CommandLineText/VisibleText.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/text/Output.h"
 
@@ -87,7 +88,7 @@ EExitStatus ShowValue(const VEvalSettings& i_rSettings)
 	{
 		if (JsonAsked())
 			throw VCommandError(EBadInput, diagnostic);
-		std::fprintf(stderr, "%s\n", diagnostic.c_str());
+		std::fprintf(stderr, "%s\n", VisibleLine(diagnostic).c_str());
 		return EBadInput;
 	}
 	PrintResult({{"value", value}}, ValueText(value) + "\n");

@@ -20,7 +20,7 @@ using NVX::IO::VSchemaChild;
 class VPrinter
 {
 public:
-	explicit VPrinter(std::string_view i_Bytes) : m_Bytes(i_Bytes) {}
+	VPrinter(std::string_view i_Bytes, std::size_t i_MostBytes) : m_Bytes(i_Bytes), m_MostBytes(i_MostBytes) {}
 
 	std::string Print(const ISchema& i_rSchema)
 	{
@@ -39,7 +39,7 @@ public:
 private:
 	bool Value(const ISchema& i_rSchema)
 	{
-		if (m_Text.size() > c_MaxTextBytes)
+		if (m_Text.size() > m_MostBytes)
 		{
 			m_Text += "...";
 			return false;
@@ -134,14 +134,15 @@ private:
 	}
 
 	NVX::IO::VBinaryReader m_Bytes;
+	const std::size_t m_MostBytes;
 	std::string m_Text;
 };
 
 } // namespace
 
-std::string ValueText(const NVX::IO::VVariant& i_rValue)
+std::string ValueText(const NVX::IO::VVariant& i_rValue, std::size_t i_MostBytes)
 {
-	return i_rValue.m_pSchema ? VPrinter(i_rValue.m_Bytes).Print(*i_rValue.m_pSchema) : "";
+	return i_rValue.m_pSchema ? VPrinter(i_rValue.m_Bytes, i_MostBytes).Print(*i_rValue.m_pSchema) : "";
 }
 
 } // namespace TesselDataStore
