@@ -29,7 +29,7 @@ TEST(Setup, TellsLineAndReasonOfWhatIsWrong)
 	    {"{\"root\": 1.5\n}", 1, "\"root\" is to be a count, not 1.5"},
 	    {"{\"pairs\": [\n{\"source\": \"a\"}]}", 2, "a pair has no \"target\""},
 	    {"{\"pairs\": [{\"source\": \"a\", \"target\": \"b\",\n\"position\": -1\n}]}", 2, "cannot be -1"},
-	    {"{\"pairs\": [{\"source\": \"a\", \"target\": \"b\", \"rotation\": 1e400}]}", 1, "no JSON"},
+	    {"{\"pairs\": [{\"source\": \"a\", \"target\": \"b\", \"rotation\": 1e400}]}", 1, "a number is larger"},
 	    {"{\"edits\": [\n\n{\"align\": false}]}", 3, "true for an edit without a value"},
 	    {"{\"edits\": [{\"scale\": 1,\n\"lift\": 2}]}", 2, "has \"scale\" and \"lift\""},
 	    {"{\"checks\": {\"sounds\": true}}", 1, "no field \"sounds\""},
@@ -142,8 +142,9 @@ TEST_F(Recipe, WritesNothingWhereACheckDoesNotHoldOrNothingIsAskedFor)
 		std::string m_Err;
 	};
 	for (const VRow& rRow : {VRow{c_Recipe, {"--dry-run", "--json"}, 0, ""},
+	         VRow{with("demo/performer.qrs", "none.qrs"), {}, 3, "recipe.json:4: \"none.qrs\" cannot be read"},
 	         VRow{with("\"joints\": 24", "\"joints\": 25"), {}, 1, "there are 24 joints, not 25"},
-	         VRow{with("\"scale\"]", "\"floor\", \"tail\"]"), {}, 1, "nothing is known of the pose's \"tail\""},
+	         VRow{with("\"scale\"]", "\"floor\", \"tail\"]"), {}, 3, "nothing of the pose is called \"tail\""},
 	         VRow{with("{\"update-targets\": true}", "{\"pose\": \"upperArmLeft=0,0,1\"}"), {}, 1,
 	             "of the checks do not hold"},
 	         VRow{with("\"sound\": true", "\"no-warnings\": true"), {"-o", "out/hero.txt"}, 2, "end in .qrr"},

@@ -8,6 +8,7 @@
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/StepNames.h"
+#include "SetupReview/rebind/RebindDocument.h"
 
 #include <boost/filesystem/operations.hpp>
 
@@ -93,7 +94,7 @@ TEST_F(Steps, OfEveryKindInAnyOrderGiveTheBytesOfASave)
 	const std::string sources[] = {RETARGET_SOURCE "/demo/performer.qrs", (m_Folder / "second.qrs").string()};
 	Put(sources[1], Get(Data("qrt/performer.qrs")));
 	const boost::filesystem::path other = m_Folder / "it's another.qrr";
-	for (unsigned seed = 1; seed <= 6; ++seed)
+	for (unsigned seed = 1; seed <= 8; ++seed)
 	{
 		SCOPED_TRACE(seed);
 		std::mt19937 random(seed);
@@ -109,7 +110,7 @@ TEST_F(Steps, OfEveryKindInAnyOrderGiveTheBytesOfASave)
 				m_Document.CreateTargetSubject();
 			const int a = upTo(60), b = upTo(40);
 			const std::size_t targets = m_Document.TargetValues().m_pParametrised->m_Targets.size();
-			switch (upTo(22))
+			switch (upTo(23))
 			{
 			case 0: m_Document.UpdateTargets(); break;
 			case 1: m_Document.RemoveUnnecessaryJoints(); break;
@@ -164,7 +165,11 @@ TEST_F(Steps, OfEveryKindInAnyOrderGiveTheBytesOfASave)
 				if (a % 2 == 0)
 					m_Document.LoadTargetSubject(other);
 				if (a % 4 == 0)
+				{
 					m_Document.MatchFilePose();
+					Pose(std::size_t(a), 0, 0.1, 0);
+					m_Document.MatchFilePose();
+				}
 				else if (b % 4 == 0)
 					m_Document.CreateTargetSubject();
 				break;
@@ -175,6 +180,11 @@ TEST_F(Steps, OfEveryKindInAnyOrderGiveTheBytesOfASave)
 			case 19:
 				for (int i = 0; i < 3; ++i)
 					Pose(std::size_t(a), std::size_t(b), 0.013 * (b + i), std::uint64_t(step) + 1);
+				break;
+			case 20:
+				if (const auto rebound = SetupReview::ReboundOf(m_Document, b % 2 == 0);
+				    rebound && rebound->m_Refusal.empty())
+					SetupReview::TakeOver(m_Document, *rebound, b % 2 == 0, a % 3 == 0);
 				break;
 			default: m_Document.AddTarget(a % 24, b, a % 2 == 0, b % 2 == 0); break;
 			}
@@ -187,9 +197,10 @@ TEST_F(Steps, OfEveryKindInAnyOrderGiveTheBytesOfASave)
 	}
 	EXPECT_GT(m_Commands, 10);
 	EXPECT_EQ(m_Kinds,
-	    (std::set<std::string>{"align", "as-it-stands", "chain", "create-joints", "expressions", "fbx-pose", "feet",
-	        "lock", "match-file-pose", "pose", "position", "prune-joints", "remove-target", "rotation", "scale",
-	        "source-name", "switch-root-height", "switch-source", "unlock", "update-targets", "weight"}));
+	    (std::set<std::string>{"align", "allow-partial", "as-it-stands", "chain", "create-joints", "expressions",
+	        "fbx-pose", "feet", "lock", "match-file-pose", "pose", "position", "prune-joints", "rebind-fbx",
+	        "rebind-source", "remove-target", "rotation", "scale", "source-name", "switch-root-height", "switch-source",
+	        "unlock", "update-targets", "weight"}));
 }
 
 } // namespace

@@ -652,6 +652,28 @@ TEST_F(Job, OffersToReBindToAChangedFileAndToAnotherPerformer)
 	press(shown("Cranium is Kopf"), "RebindDo");
 	saveAs("second.qrr");
 	EXPECT_TRUE(Content("second.qrr") == CommandLine({"rebind", File("rebound.qrr"), "--source", File("second.qrs")}));
+	// The steps since the character's file was written over give the file again.
+	rOperator.AnswerNextDialog(File("steps.json"));
+	rOperator.ChooseInMenu("EditMenu", "SaveRecipe");
+	EXPECT_EVENTUALLY(Content("steps.json").contains("rebind-source"));
+	Run({"build", File("steps.json"), "-o", File("built.qrr")});
+	EXPECT_TRUE(Content("built.qrr") == Content("second.qrr")) << Content("steps.json").toStdString();
+
+	EXPECT_EQ(rOperator.ChooseInMenu("EditMenu", "Undo"), "&Undo Re-bind");
+	rOperator.ChooseInMenu("ToolsMenu", "RebindToPerformer");
+	QWidget* const pDialog = shown("Cranium is Kopf");
+	auto* const pMeasure = pDialog->findChild<QCheckBox*>("RebindMeasure");
+	QTest::mouseClick(
+	    pDialog->windowHandle(), Qt::LeftButton, {}, pMeasure->mapTo(pDialog, QPoint(10, pMeasure->height() / 2)));
+	EXPECT_TRUE(pMeasure->isChecked());
+	press(pDialog, "RebindDo");
+	saveAs("measured.qrr");
+	EXPECT_TRUE(Content("measured.qrr")
+	    == CommandLine({"rebind", File("rebound.qrr"), "--source", File("second.qrs"), "--measure"}));
+	rOperator.AnswerNextDialog(File("measured.json"));
+	rOperator.ChooseInMenu("EditMenu", "SaveRecipe");
+	EXPECT_EVENTUALLY(Content("measured.json").contains("rebind-source"));
+	EXPECT_TRUE(Content("measured.json").contains("update-targets"));
 }
 
 TEST_F(Job, ClosesWhileTheSkinLoads)

@@ -11,6 +11,9 @@
 #include "DebugServices/GlobalLog.h"
 #include "FileDigest/FileDigest.h"
 
+#include <algorithm>
+#include <utility>
+
 namespace CommandLine
 {
 namespace
@@ -44,10 +47,11 @@ class VInputs
 {
 public:
 	/// @param i_rName as the recipe has it
-	void AddFile(const std::string& i_rName, const std::string& i_rFile)
+	/// @param i_rWhere it stands there, as "FILE:LINE: "
+	void AddFile(const std::string& i_rName, const std::string& i_rFile, const std::string& i_rWhere)
 	{
 		if (!i_rName.empty() && i_rFile != c_pStandardStream)
-			m_Inputs.push_back({i_rName, i_rFile, DigestOf(i_rFile)});
+			m_Inputs.push_back({i_rName, i_rFile, DigestOf(i_rFile, i_rWhere)});
 	}
 	/// The bytes themselves.
 	void AddText(const std::string& i_rName, const std::string& i_rText)
@@ -61,7 +65,7 @@ public:
 		VJson told = VJson::array();
 		for (const VInput& rInput : m_Inputs)
 		{
-			if (!rInput.m_File.empty() && DigestOf(rInput.m_File) != rInput.m_Digest)
+			if (!rInput.m_File.empty() && DigestOf(rInput.m_File, "") != rInput.m_Digest)
 				throw VCommandError(EBadInput,
 				    "\"" + rInput.m_Name + "\" changed while it was read, and nothing is written: build again");
 			NVX_LOG(c_pCategory, NVX::ELogInformation, "Input \"%1%\": SHA-256 %2%", rInput.m_Name, rInput.m_Digest);
@@ -79,17 +83,24 @@ private:
 		std::string m_Digest;
 	};
 
-	static std::string DigestOf(const std::string& i_rFile)
+	static std::string DigestOf(const std::string& i_rFile, const std::string& i_rWhere)
 	{
 		std::string error;
 		const auto digest = FileDigest::Sha256(InputPath(i_rFile), error);
 		if (!digest)
-			throw VCommandError(EBadInput, error);
+			throw VCommandError(EBadInput, i_rWhere + error);
 		return *digest;
 	}
 
 	std::vector<VInput> m_Inputs;
 };
+
+/// A field of the text, as "FILE:LINE: "; the file alone for one that it does not have.
+std::string WhereOf(const SetupIO::VSetup& i_rSetup, const std::string& i_rPath, const std::string& i_rField)
+{
+	const auto field = std::ranges::find(i_rSetup.m_Fields, i_rField, &std::pair<std::string, std::size_t>::first);
+	return i_rPath + ":" + (field == i_rSetup.m_Fields.end() ? "" : std::to_string(field->second) + ":") + " ";
+}
 
 EExitStatus Build(const VBuildSettings& i_rSettings)
 {
@@ -111,12 +122,21 @@ EExitStatus Build(const VBuildSettings& i_rSettings)
 	if (recipe.m_Checks && recipe.m_Checks->m_bNoWarnings)
 		AskStrict();
 	VSession session;
-	for (const std::string& rName : {recipe.m_Fbx, recipe.m_Subject, recipe.m_Source})
-		inputs.AddFile(rName, PathBeside(rPath, rName));
+	for (const auto& [pField, rName] : {std::pair<const char*, const std::string&>("fbx", recipe.m_Fbx),
+	         {"subject", recipe.m_Subject}, {"source", recipe.m_Source}})
+		inputs.AddFile(rName, PathBeside(rPath, rName), WhereOf(recipe, rPath, pField));
 	for (const VEdit& rEdit : edits)
 		if (rEdit.m_pKind && rEdit.m_pKind->m_bFile)
-			inputs.AddFile(rEdit.m_Value, rEdit.m_Value);
-	MakeSubject(session, making, edits);
+			inputs.AddFile(rEdit.m_Value, rEdit.m_Value, rEdit.m_Where);
+	try
+	{
+		MakeSubject(session, making, edits);
+	}
+	catch (const VCommandError& rError)
+	{
+		const std::string reason = rError.what();
+		throw VCommandError(rError.Status(), reason.starts_with(rPath) ? reason : rPath + ": " + reason);
+	}
 	session.m_ReportJson["inputs"] = inputs.Told();
 	std::vector<std::string> broken;
 	if (recipe.m_Checks)

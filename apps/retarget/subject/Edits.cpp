@@ -5,6 +5,7 @@
 #include "CommandLineText/Suggest.h"
 #include "retarget/subject/Aligning.h"
 #include "retarget/subject/Mapping.h"
+#include "retarget/subject/Rebinding.h"
 #include "retarget/subject/SetupFile.h"
 
 #include "CoreOrlexTypes/JointType.h"
@@ -349,8 +350,8 @@ constexpr VEditKind c_Kinds[] = {
         "the target, or of both where both have them",
         Pair},
     {"--allow-partial", nullptr,
-        "Let a target of one side, wherever it stands, go without a partner where none is found; without this it is an "
-        "error (exit status 1)",
+        "Let a target of one side, wherever it stands, go without a partner where none is found, and go without what "
+        "re-binding cannot keep; without this it is an error (exit status 1)",
         AllowPartial},
     {"--auto", nullptr,
         "Add targets for all pairs of segments that \"retarget map\" proposes, with the kinds and weights that it "
@@ -412,6 +413,15 @@ constexpr VEditKind c_Kinds[] = {
     {"--fbx-pose", "FILE",
         "As --match-file-pose, by the character's FBX file FILE, which a saved retarget subject has none of", FbxPose,
         false, true},
+    {"--rebind-fbx", "FILE",
+        "Take all over to the character's changed FBX file FILE, as \"retarget rebind\" does; what could not be kept "
+        "is "
+        "an error (exit status 1) without --allow-partial",
+        RebindFbx, false, true},
+    {"--rebind-source", nullptr,
+        "Take the targets over to the source that there is, another performer, as \"retarget rebind\" does; offsets "
+        "stay, --update-targets behind it measures them",
+        RebindSource},
     {"--switch-source", "FILE.qrs", "From here on, the source is FILE.qrs", SwitchSource, false, true},
     {"--source-name", "NAME",
         "Save NAME as the source that the subject is made for, in place of the one that it was made with", NameSource},
@@ -622,6 +632,10 @@ void ApplyEdits(VSession& io_rSession, const VEdits& i_rEdits)
 	const bool bPartial = io_rSession.m_bAllowPartial;
 	for (const std::string& rSentence : rWithoutPartner)
 		NVX_LOG(c_pCategory, bPartial ? NVX::ELogWarning : NVX::ELogError, "%1%", rSentence);
+	for (const std::string& rLost : io_rSession.m_Lost)
+		NVX_LOG(c_pCategory, bPartial ? NVX::ELogWarning : NVX::ELogError, "Not kept: %1%", rLost);
+	if (!io_rSession.m_Lost.empty() && !bPartial)
+		throw VCommandError(EFindings, "Re-binding could not keep all: --allow-partial goes without");
 	if (!rWithoutPartner.empty() && !bPartial)
 		throw VCommandError(EFindings,
 		    "--symmetry found no partner for " + std::to_string(rWithoutPartner.size())

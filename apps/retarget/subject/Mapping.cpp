@@ -132,6 +132,9 @@ void ApplyPreset(VSession& io_rSession, const std::string& i_rPath)
 	const VMapped mapped = ProposeForSubject(io_rSession);
 	const RetargetSetup::VPresetFit fit =
 	    RetargetSetup::FitPreset(preset.m_Pairs, rSource, io_rSession.Target(), &mapped.m_Proposal);
+	if (fit.m_Fitted.empty())
+		throw VCommandError(
+		    EFindings, "--preset: no pair of \"" + i_rPath + "\" fits these two: " + fit.m_Misfits.front().m_Reason);
 	VJson proposed = VJson::array();
 	for (const RetargetSetup::VFittedPair& rPair : fit.m_Fitted)
 	{

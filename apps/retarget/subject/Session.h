@@ -62,6 +62,9 @@ public:
 	/// Segments of the target subject that have a joint.
 	std::size_t CountJoints() const;
 
+	/// False for one from standard input.
+	bool IsSourceNamed() const { return m_bSourceNamed; }
+
 	/// Why the command that did nothing last did nothing, a sentence.
 	const std::string& WhyIgnored() const { return m_WhyIgnored; }
 
@@ -82,6 +85,8 @@ public:
 	/// One sentence for each target of a side that should have got a partner and did not.
 	std::vector<std::string> m_WithoutPartner;
 	bool m_bAllowPartial = false;
+	/// What re-binding could not keep, a sentence each.
+	std::vector<std::string> m_Lost;
 	/// Of pairs that are proposed.
 	double m_MinimumScore = SetupProposal::c_DefaultLeastScore;
 	/// The bone that the target subject was made from; nothing for one that was loaded.

@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <iterator>
 
 namespace SetupIO
 {
@@ -145,6 +146,17 @@ VEdit ReadEdit(const VTextNode& i_rNode)
 	return edit;
 }
 
+const std::string& PoseId(const VTextNode& i_rNode)
+{
+	const std::string& rId = Text(i_rNode);
+	if (std::ranges::find(Fields::c_PoseIds, rId) != std::end(Fields::c_PoseIds))
+		return rId;
+	std::string known;
+	for (const char* const pId : Fields::c_PoseIds)
+		known += (known.empty() ? "" : ", ") + std::string(pId);
+	Refuse(i_rNode, "nothing of the pose is called " + Quoted(rId) + "; there are " + known);
+}
+
 VChecks ReadChecks(const VTextNode& i_rNode)
 {
 	Require(i_rNode, VTextNode::EObject, "an object, as {\"sound\": true}");
@@ -158,7 +170,7 @@ VChecks ReadChecks(const VTextNode& i_rNode)
 		{
 			Require(rField, VTextNode::EList, "a list of texts");
 			for (const VTextNode& rItem : rField.m_Items)
-				checks.m_Pose.push_back(Text(rItem));
+				checks.m_Pose.push_back(PoseId(rItem));
 		}
 		else if (!TakeField(Fields::c_CheckFlags, rField, checks, known)
 		    && !TakeField(Fields::c_CheckCounts, rField, checks, known)

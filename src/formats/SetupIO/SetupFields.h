@@ -67,7 +67,8 @@ inline constexpr VField<VChecks, std::optional<double>> c_CheckLimits[] = {
     {"residual-degrees", &VChecks::m_ResidualDegrees, "Largest angle of a target in the bind poses, in degrees"},
 };
 inline constexpr const char* c_Pose = "pose";
-inline constexpr const char* c_PoseHelp =
-    "What \"retarget map\" finds fine of the pose: \"facing\", \"arms\", \"floor\"";
+inline constexpr const char* c_PoseHelp = "What \"retarget map\" finds fine of the pose";
+/// What it looks at.
+inline constexpr const char* c_PoseIds[] = {"facing", "sides", "arms", "legs", "scale", "floor"};
 
 } // namespace SetupIO::Fields

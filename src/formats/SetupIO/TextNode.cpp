@@ -106,8 +106,9 @@ public:
 		// Its own texts begin with a number in brackets and the place.
 		const std::string text = i_rException.what();
 		const std::size_t detail = text.rfind(" - ");
-		return Refuse(
-		    "this is no JSON" + (detail == std::string::npos ? std::string() : ": " + text.substr(detail + 3)));
+		// The only other thing that it refuses.
+		return Refuse(detail == std::string::npos ? "a number is larger than any that can be held"
+		                                          : "this is no JSON: " + text.substr(detail + 3));
 	}
 
 private:

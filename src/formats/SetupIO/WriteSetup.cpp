@@ -156,7 +156,8 @@ std::string SchemaText(const std::vector<VEditForm>& i_rEdits)
 	PutSchema(Fields::c_CheckFlags, {{"type", "boolean"}}, checks);
 	PutSchema(Fields::c_CheckCounts, {{"type", "integer"}, {"minimum", 0}}, checks);
 	PutSchema(Fields::c_CheckLimits, weight, checks);
-	checks[Fields::c_Pose] = Described({{"type", "array"}, {"items", text}}, Fields::c_PoseHelp);
+	checks[Fields::c_Pose] = Described(
+	    {{"type", "array"}, {"items", {{"type", "string"}, {"enum", Fields::c_PoseIds}}}}, Fields::c_PoseHelp);
 
 	VJson properties = VJson::object();
 	PutSchema(Fields::c_Texts, text, properties);

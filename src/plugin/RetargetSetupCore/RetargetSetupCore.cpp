@@ -169,15 +169,17 @@ void VRetargetSetupCore::SetSourceSubject(
 }
 
 bool VRetargetSetupCore::SetTargetSubject(VSubjectParametrised i_Parametrised,
-    VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras)
+    VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras,
+    const RetargetSetup::VEdit& i_rEdit)
 {
-	const VStep step(*this, {});
+	const VStep step(*this, i_rEdit);
 	if (!ReplaceTargetItems(std::move(i_Parametrised),
 	        std::make_shared<const VSubjectApplicationData>(std::move(i_ApplicationData)), NewIdentities()))
 		return false;
 	TakeExtras(std::move(i_Extras));
 	m_Target.m_AtRest = TargetValues();
-	BeginSession({});
+	if (i_rEdit.m_Commands.empty())
+		BeginSession({});
 	return true;
 }
 

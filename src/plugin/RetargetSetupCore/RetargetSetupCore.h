@@ -79,6 +79,12 @@ public:
 	std::string UndoName() const { return StepName(true); }
 	std::string RedoName() const { return StepName(false); }
 
+	/// Several edits as one step, which recipes have as those of them that they know by a command of their own.
+	void RunStep(const RetargetSetup::VEdit& i_rEdit, const std::function<void()>& i_rEdits);
+
+	/// Whether the steps so far would read something else now, or read this file, which is another one by now.
+	bool StepsReadAgain(const boost::filesystem::path& i_rFile) const;
+
 	/// The steps since the target subject was made or loaded as a command line that does them again, without what was
 	/// undone. Empty, and the command is ignored, where there is none or where what they began with is in no file.
 	std::string SessionCommands();
@@ -157,6 +163,8 @@ public:
 
 	/// Stem of the FBX file that the skeleton is of.
 	const std::string& GetTargetName() const { return m_TargetName; }
+	/// The file itself; empty before the first.
+	const boost::filesystem::path& GetTargetFBXPath() const { return m_TargetFBXFile.m_Path; }
 
 	/// False if the latest FBX file broke off and the skeleton is what was read until then.
 	bool IsTargetFBXComplete() const { return m_bTargetFBXComplete; }
@@ -214,9 +222,11 @@ public:
 	    CoreOrlexTypes::VSubjectParametrised i_Parametrised, CoreOrlexTypes::VSubjectApplicationData i_ApplicationData);
 
 	/// @param i_Extras of the file that the subject comes from.
+	/// @param i_rEdit with commands: recipes go on with those; without, they begin with this subject.
 	/// @return false, with no change, if the host made no item.
 	bool SetTargetSubject(CoreOrlexTypes::VSubjectParametrised i_Parametrised,
-	    CoreOrlexTypes::VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras = {});
+	    CoreOrlexTypes::VSubjectApplicationData i_ApplicationData, CoreOrlexQRTIO::VSubjectQRTExtras i_Extras = {},
+	    const RetargetSetup::VEdit& i_rEdit = {});
 
 	/// An edit that leaves the application data and the extras as they are. The targets stay the ones that they are if
 	/// there are as many as before.
@@ -294,9 +304,6 @@ protected:
 	/// It is as it was before several tries, which are one step by the edit's way.
 	void Restore(const VPosedTarget& i_rBefore, const RetargetSetup::VEdit& i_rEdit);
 
-	/// Several edits as one step, which recipes have as those of them that they know by a command of their own.
-	void RunStep(const RetargetSetup::VEdit& i_rEdit, const std::function<void()>& i_rEdits);
-
 	// What whoever shows the document tells on. Here they do nothing.
 
 	/// The subjects are others, and the change signal is about to fire.
@@ -334,6 +341,9 @@ private:
 		~VStep();
 		VStep(const VStep&) = delete;
 		VStep& operator=(const VStep&) = delete;
+
+		/// What it gathers is not known to recipes.
+		bool IsUnknown() const { return m_bUnknown; }
 
 	private:
 		void Begin();

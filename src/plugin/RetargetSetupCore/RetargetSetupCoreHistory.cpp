@@ -86,6 +86,20 @@ void VRetargetSetupCore::RunStep(const VEdit& i_rEdit, const std::function<void(
 {
 	const VStep step(*this, i_rEdit, true);
 	i_rEdits();
+	// What recipes know of the single ones they do not know of all.
+	if (step.IsUnknown() && i_rEdit.m_Way == 0 && m_Target.m_pSteps)
+		BeginSession({});
+}
+
+bool VRetargetSetupCore::StepsReadAgain(const boost::filesystem::path& i_rFile) const
+{
+	if (!m_Target.m_pSteps)
+		return false;
+	std::vector<std::string> changed;
+	const SetupIO::VSetup recipe = RetargetSetup::RecipeOf(*m_Target.m_pSteps, changed);
+	const std::string file = UtilsFileSystem::ToUtf8(i_rFile);
+	return !changed.empty()
+	    || std::ranges::any_of(recipe.m_Edits, [&](const SetupIO::VEdit& i_rEdit) { return i_rEdit.m_Value == file; });
 }
 
 void VRetargetSetupCore::BeginSession(RetargetSetup::VBeginning i_Beginning)

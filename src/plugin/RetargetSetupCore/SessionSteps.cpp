@@ -115,7 +115,7 @@ constexpr const char* c_SwitchSource = "switch-source";
 
 bool IsFileCommand(const std::string& i_rName)
 {
-	return i_rName == c_SwitchSource || i_rName == c_FbxPoseCommand;
+	return i_rName == c_SwitchSource || i_rName == c_FbxPoseCommand || i_rName == c_RebindFbxCommand;
 }
 
 void TellIfChanged(const VReadFile& i_rFile, std::vector<std::string>& o_rChanged)
@@ -255,7 +255,11 @@ SetupIO::VSetup RecipeOf(const VSessionStep& i_rLast, std::vector<std::string>& 
 	std::string fbx = recipe.m_Fbx;
 	const auto add = [&](SetupIO::VEdit i_Edit)
 	{
-		if (i_Edit.m_Name == c_FbxPoseCommand && std::exchange(fbx, *i_Edit.m_Value) == *i_Edit.m_Value)
+		if (i_Edit.m_Name == c_RebindFbxCommand)
+			fbx = *i_Edit.m_Value;
+		// Of a recipe that begins with a subject no file is the character's.
+		else if (i_Edit.m_Name == c_FbxPoseCommand && std::exchange(fbx, *i_Edit.m_Value) == *i_Edit.m_Value
+		    && !recipe.m_Fbx.empty())
 			i_Edit = Command("match-file-pose");
 		recipe.m_Edits.push_back(std::move(i_Edit));
 	};

@@ -77,6 +77,7 @@ std::optional<std::vector<SetupIO::VEdit>> EditsBetween(const VSubjectValues& i_
 
 /// Which a recipe has only with another file than the one before.
 inline constexpr const char* c_FbxPoseCommand = "fbx-pose";
+inline constexpr const char* c_RebindFbxCommand = "rebind-fbx";
 inline constexpr const char* c_AsItStandsCommand = "as-it-stands";
 
 /// @param i_Scale that it was made with.

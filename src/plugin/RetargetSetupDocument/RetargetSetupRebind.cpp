@@ -1,10 +1,8 @@
 // The target subject of VRetargetSetup, taken over to a changed file of its character or to another performer.
 
 #include "RetargetSetupCore/IgnoredCommands.h"
-#include "RetargetSetupCore/RestSkeletons.h"
-#include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
-#include "SetupReview/rebind/Rebind.h"
+#include "SetupReview/rebind/RebindDocument.h"
 
 #include <QStringList>
 
@@ -15,24 +13,6 @@ namespace
 
 using SetupReview::ERebindRule;
 using SetupReview::VRebound;
-
-/// Nothing if there are no two to hold against each other.
-std::optional<VRebound> Rebound(const VRetargetSetupCore& i_rDocument, bool i_bPerformer)
-{
-	const auto source = i_rDocument.SourceValues();
-	const auto target = i_rDocument.TargetValues();
-	const auto pSkeleton = i_rDocument.GetFBXSkeleton();
-	if (!target.m_pParametrised || !target.m_pApplicationData || !target.m_pSubject
-	    || (i_bPerformer ? !source.m_pParametrised : !pSkeleton))
-		return std::nullopt;
-	const SetupReview::VSetup setup{
-	    {*target.m_pParametrised, *target.m_pApplicationData}, i_rDocument.GetTargetExtras()};
-	if (i_bPerformer)
-		return SetupReview::RebindPerformer(setup, RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject),
-		    RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject), i_rDocument.GetShownSourceName());
-	return SetupReview::RebindCharacter(
-	    setup, {*pSkeleton, i_rDocument.GetTargetAxisMatrix(), i_rDocument.GetTargetName(), {}});
-}
 
 QStringList ToStrings(const std::vector<std::string>& i_rTexts)
 {
@@ -53,7 +33,7 @@ QString RuleText(const SetupReview::VRebindMatch& i_rMatch)
 
 QVariantMap VRetargetSetup::LookAtRebind(bool i_bPerformer) const
 {
-	const std::optional<VRebound> rebound = Rebound(*this, i_bPerformer);
+	const std::optional<VRebound> rebound = SetupReview::ReboundOf(*this, i_bPerformer);
 	if (!rebound)
 		return {};
 	if (!rebound->m_Refusal.empty())
@@ -80,7 +60,7 @@ QVariantMap VRetargetSetup::LookAtRebind(bool i_bPerformer) const
 void VRetargetSetup::Rebind(bool i_bPerformer, bool i_bMeasure)
 {
 	constexpr const char* c_Command = "Rebind";
-	std::optional<VRebound> rebound = Rebound(*this, i_bPerformer);
+	const std::optional<VRebound> rebound = SetupReview::ReboundOf(*this, i_bPerformer);
 	if (!rebound)
 		return CommandIgnored(c_Command,
 		    !TargetValues().m_pParametrised ? RetargetSetup::Ignored::c_NoTarget
@@ -88,13 +68,5 @@ void VRetargetSetup::Rebind(bool i_bPerformer, bool i_bMeasure)
 		                                    : RetargetSetup::Ignored::c_NoFBX);
 	if (!rebound->m_Refusal.empty())
 		return CommandIgnored(c_Command, rebound->m_Refusal);
-	auto& rRecord = rebound->m_Setup.m_Record;
-	RunStep({RetargetSetup::Steps::c_Rebind},
-	    [&]
-	    {
-		    if (SetTargetSubject(std::move(rRecord.m_SubjectParametrised), std::move(rRecord.m_SubjectApplicationData),
-		            std::move(rebound->m_Setup.m_Extras))
-		        && i_bMeasure)
-			    VRetargetSetupCore::UpdateTargets();
-	    });
+	SetupReview::TakeOver(*this, *rebound, i_bPerformer, i_bMeasure);
 }
