@@ -15,6 +15,10 @@ file(RELATIVE_PATH RETARGET_FROM_PROGRAMS /${CMAKE_INSTALL_BINDIR} /${RETARGET_L
 set(CMAKE_INSTALL_RPATH $ORIGIN $ORIGIN/${RETARGET_FROM_PROGRAMS})
 # One form of code for the libraries, the module that is made of them, and the programs.
 add_compile_options(-fPIC -Wall -Wextra -Werror)
+if(WIN32)
+	# Of the system's headers no macros by the names of functions, and the core of them only.
+	add_compile_definitions(NOMINMAX WIN32_LEAN_AND_MEAN)
+endif()
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_LESS 13)
 	# False alarms about string concatenation at -O3.
 	add_compile_options(-Wno-restrict)

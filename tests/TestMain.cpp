@@ -16,8 +16,10 @@ int main(int i_Count, char** i_ppArguments)
 	{
 		// The environment names a language that is not installed; the C library stays in "C" then, too.
 	}
+#ifdef LC_MESSAGES
 	// What the system says of errors stays comparable.
 	std::setlocale(LC_MESSAGES, "C");
+#endif
 	testing::InitGoogleTest(&i_Count, i_ppArguments);
 	return RUN_ALL_TESTS();
 }

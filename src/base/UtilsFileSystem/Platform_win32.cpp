@@ -1,5 +1,3 @@
-#define NOMINMAX
-#define WIN32_LEAN_AND_MEAN
 #include <windows.h>
 // After windows.h, which it needs.
 #include <restartmanager.h>
@@ -129,7 +127,7 @@ public:
 int RuntimeError()
 {
 	const DWORD error = ::GetLastError();
-	::_set_doserrno(error);
+	_doserrno = error;
 	switch (error)
 	{
 	case ERROR_FILE_NOT_FOUND:
@@ -198,8 +196,11 @@ std::string MachineName()
 std::wstring NativePath(const boost::filesystem::path& i_rPath)
 {
 	boost::system::error_code error;
-	const boost::filesystem::path full = boost::filesystem::absolute(i_rPath, error);
-	return error ? i_rPath.native() : AddLongPathPrefix(full.lexically_normal().native(), MAX_PATH);
+	boost::filesystem::path full = boost::filesystem::absolute(i_rPath, error).lexically_normal();
+	// Of a slash at the end; behind the prefix it would be a name.
+	if (full.filename_is_dot())
+		full = full.parent_path();
+	return error ? i_rPath.native() : AddLongPathPrefix(full.native(), MAX_PATH);
 }
 
 std::FILE* Open(const boost::filesystem::path& i_rPath, const char* i_pMode, int& o_rError)
@@ -212,8 +213,7 @@ std::FILE* Open(const boost::filesystem::path& i_rPath, const char* i_pMode, int
 
 bool IsSharingViolation(int i_Error)
 {
-	unsigned long error = 0;
-	::_get_doserrno(&error);
+	const unsigned long error = _doserrno;
 	return i_Error == EACCES && (error == ERROR_SHARING_VIOLATION || error == ERROR_LOCK_VIOLATION);
 }
 
