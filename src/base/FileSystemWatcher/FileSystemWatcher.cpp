@@ -368,7 +368,7 @@ void VFileSystemWatcher::Watch(const path& i_rDirectory, VChangeSignal::VCallbac
 	if (i_FileCallback)
 		rDirectory.m_Files.Connect(std::move(i_FileCallback), i_pDispatcher);
 	if (i_DirectoryCallback)
-		rDirectory.m_Directories.Connect(std::move(i_DirectoryCallback), i_pDispatcher);
+		rDirectory.m_Directories.Connect(std::move(i_DirectoryCallback), std::move(i_pDispatcher));
 }
 
 void VFileSystemWatcher::SetDirectories(const std::set<path>& i_rDirectories)

@@ -63,7 +63,7 @@ bool VMathNodeSimple::Assign(const IMathNode& i_rOther)
 		return false;
 	VMathNodeSimple copy(*pOther);
 	Reset();
-	*this = std::move(copy);
+	*this = copy;
 	return true;
 }
 

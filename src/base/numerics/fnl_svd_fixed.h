@@ -2,6 +2,7 @@
 
 #include "numerics/Lapack.h"
 
+#include <algorithm>
 #include <array>
 #include <limits>
 
@@ -14,7 +15,7 @@ template <std::size_t t_Rows, std::size_t t_Columns>
 class fnl_svd_fixed
 {
 public:
-	static constexpr std::size_t c_Smaller = t_Rows < t_Columns ? t_Rows : t_Columns;
+	static constexpr std::size_t c_Smaller = std::min(t_Rows, t_Columns);
 
 	explicit fnl_svd_fixed(const std::array<double, t_Rows * t_Columns>& i_rM)
 	{

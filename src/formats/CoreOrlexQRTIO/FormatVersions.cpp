@@ -8,6 +8,7 @@ namespace
 {
 
 using UtilsRapidXml::VVersion;
+using VTarget = CoreOrlexTypes::VSubjectParametrised::VTarget;
 
 struct VVersionValue
 {
@@ -52,7 +53,6 @@ std::uint32_t LowestVersionValue(const CoreOrlexTypes::VSubjectParametrised& i_r
     const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData, const VSubjectQRTExtras& i_rExtras)
 {
 	using VSegment = CoreOrlexTypes::VSubjectParametrised::VSegment;
-	using VTarget = CoreOrlexTypes::VSubjectParametrised::VTarget;
 	if (!i_rSubject.m_ModelVersion.empty() || !i_rApplicationData.m_RetargetSourceTemplate.empty()
 	    || !i_rApplicationData.m_RetargetSourceSubject.empty() || !i_rExtras.m_DynamicSubspaces.empty()
 	    || std::ranges::any_of(

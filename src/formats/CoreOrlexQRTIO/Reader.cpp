@@ -18,10 +18,11 @@ namespace CoreOrlexQRTIO
 
 using CoreOrlexTypes::VSubjectApplicationData;
 using CoreOrlexTypes::VSubjectParametrised;
-using VTexts = std::vector<std::string>;
 
 namespace
 {
+
+using VTexts = std::vector<std::string>;
 
 /// Walks the document's elements.
 void ReadTree(UtilsRapidXml::VDocument& i_rDocument, bool i_bOwnFormsAreDetails, VReading& io_rReading,

@@ -402,14 +402,14 @@ private:
 	/// False if it was cancelled.
 	bool AddAnimation()
 	{
-		struct VTrack
+		struct VSampled
 		{
 			std::vector<float> m_Places, m_Turns;
 			std::array<double, 4> m_Last{};
 			bool m_bGoes = false;
 		};
 		std::vector<float> times;
-		std::vector<VTrack> tracks(m_rBones.m_Joints.size());
+		std::vector<VSampled> tracks(m_rBones.m_Joints.size());
 		for (std::size_t frame = 0; frame < m_rTake.m_Frames; ++frame)
 		{
 			if (m_rSettings.m_Progress && !m_rSettings.m_Progress(double(frame) / double(m_rTake.m_Frames)))
@@ -421,7 +421,7 @@ private:
 			{
 				if (!m_Motion.IsDriven(i))
 					continue;
-				VTrack& rTrack = tracks[i];
+				VSampled& rTrack = tracks[i];
 				const VJointPose pose = Local(places, i), rest = Local(m_Rest, i);
 				rTrack.m_Last = Quaternion(pose.R, rTrack.m_Last);
 				for (const double number : rTrack.m_Last)

@@ -82,11 +82,11 @@ void VParameterEnumFolderWatcher::OnDirectoryChanged(const QString& i_rFolder)
 	const boost::filesystem::path changed = UtilsFileSystem::PathFromUtf8(i_rFolder.toStdString());
 	// Other things happen in the folders above, too.
 	const bool bConcerns = std::any_of(m_Folders.begin(), m_Folders.end(),
-	    [&](const VWatchedFolder& i_rFolder)
+	    [&](const VWatchedFolder& i_rWatched)
 	    {
-		    return !i_rFolder.m_Folder.empty()
-		        && (UtilsFileSystem::Canonical(i_rFolder.m_Folder) == UtilsFileSystem::Canonical(changed)
-		            || Stamp(i_rFolder.m_Folder) != m_Stamps[i_rFolder.m_Folder]);
+		    return !i_rWatched.m_Folder.empty()
+		        && (UtilsFileSystem::Canonical(i_rWatched.m_Folder) == UtilsFileSystem::Canonical(changed)
+		            || Stamp(i_rWatched.m_Folder) != m_Stamps[i_rWatched.m_Folder]);
 	    });
 	if (bConcerns)
 		RefreshLater();

@@ -48,7 +48,7 @@ public:
 		auto [at, end] = m_Schemas.equal_range(hash);
 		while (at != end)
 		{
-			if (const VSchemaPointer pFound = at->second.lock())
+			if (VSchemaPointer pFound = at->second.lock())
 			{
 				if (*pFound == i_Schema)
 					return pFound;

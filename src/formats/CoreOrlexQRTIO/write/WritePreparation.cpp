@@ -34,26 +34,21 @@ bool PrepareTree(VWriting& io_rWriting, VTexts& io_rErrors)
 		else if (parent < rSegments.size())
 			io_rWriting.m_Segments[parent].m_Children.push_back(i);
 	}
-	std::size_t reached = 0;
+	// Level by level, each behind the one before.
+	std::vector<std::uint32_t> reached = io_rWriting.m_Roots;
 	std::size_t depth = 0;
-	std::vector<std::uint32_t> level = io_rWriting.m_Roots;
-	for (; !level.empty(); ++depth)
-	{
-		reached += level.size();
-		std::vector<std::uint32_t> next;
-		for (const std::uint32_t index : level)
+	for (std::size_t at = 0; at < reached.size(); ++depth)
+		for (const std::size_t levelEnd = reached.size(); at < levelEnd; ++at)
 		{
-			const std::vector<std::uint32_t>& rChildren = io_rWriting.m_Segments[index].m_Children;
-			next.insert(next.end(), rChildren.begin(), rChildren.end());
+			const std::vector<std::uint32_t>& rChildren = io_rWriting.m_Segments[reached[at]].m_Children;
+			reached.insert(reached.end(), rChildren.begin(), rChildren.end());
 		}
-		level = std::move(next);
-	}
-	if (reached != rSegments.size())
+	if (reached.size() != rSegments.size())
 		io_rErrors.push_back(
 		    (boost::format(
 		         "%1% segments cannot be reached from a root: their parents are missing or go round in a ring.",
 		         std::locale::classic())
-		        % (rSegments.size() - reached))
+		        % (rSegments.size() - reached.size()))
 		        .str());
 	else if (depth > c_MaximumSegmentDepth)
 		io_rErrors.push_back((boost::format("A chain of %1% segments is longer than a file can hold, which is %2%.",

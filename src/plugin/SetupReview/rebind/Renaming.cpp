@@ -7,7 +7,12 @@
 namespace SetupReview
 {
 
+namespace
+{
+
 using VTarget = CoreOrlexTypes::VSubjectParametrised::VTarget;
+
+} // namespace
 
 std::string TargetName(const CoreOrlexTypes::VSubjectParametrised& i_rSubject, std::size_t i_Target)
 {

@@ -39,8 +39,8 @@ template <typename TSubject>
 void ScaleJointOf(typename TSubject::VJoint& io_rJoint, double i_Factor, const char* i_pUnknownType,
     std::initializer_list<VNumbers*> i_States, std::initializer_list<VNumbers*> i_Matrices)
 {
-	constexpr const char* c_Category = VSubjectKind<TSubject>::c_LogCategory;
 	using VJoint = VSubjectParametrised::VJoint;
+	using VKind = VSubjectKind<TSubject>;
 	switch (io_rJoint.m_JointType)
 	{
 	case VJoint::EFree:
@@ -54,8 +54,8 @@ void ScaleJointOf(typename TSubject::VJoint& io_rJoint, double i_Factor, const c
 	case VJoint::EHardySpicer:
 	case VJoint::EHinge:
 	case VJoint::EDummy: break;
-	case VJoint::EBadJointType: NVX_LOG(c_Category, NVX::ELogError, "Cannot scale bad joint"); break;
-	default: NVX_LOG(c_Category, NVX::ELogError, i_pUnknownType); break;
+	case VJoint::EBadJointType: NVX_LOG(VKind::c_LogCategory, NVX::ELogError, "Cannot scale bad joint"); break;
+	default: NVX_LOG(VKind::c_LogCategory, NVX::ELogError, i_pUnknownType); break;
 	}
 }
 
