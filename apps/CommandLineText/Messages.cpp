@@ -1,5 +1,6 @@
 #include "CommandLineText/Messages.h"
 
+#include "CommandLineText/ProgressBar.h"
 #include "CommandLineText/Suggest.h"
 #include "CommandLineText/VisibleText.h"
 
@@ -110,6 +111,7 @@ void Show(const VMessageSettings& i_rSettings, const VMessage& i_rMessage, EExit
 	if (i_Status != EFine)
 		json["status"] = int(i_Status);
 	const std::string line = json.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace) + "\n";
+	ClearProgress();
 	std::fputs(line.c_str(), stderr);
 	Keep(line);
 }
@@ -203,6 +205,7 @@ void PrintMessage(const NVX::VLogCategory& i_rCategory, int i_Level, const std::
 	static const bool s_bColour = HasColours(STDERR_FILENO);
 	const VLevel& rLevel = LevelOf(i_Level);
 	const std::string text = " " + i_rCategory.Name() + ": " + OneLine(i_rMessage) + "\n";
+	ClearProgress();
 	std::fprintf(stderr, "%s%s%s%s", s_bColour ? rLevel.m_pColour : "", rLevel.m_pName, s_bColour ? "\033[0m" : "",
 	    text.c_str());
 	Keep(rLevel.m_pName + text);

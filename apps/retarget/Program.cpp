@@ -2,6 +2,7 @@
 
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Parsing.h"
+#include "CommandLineText/ProgressBar.h"
 #include "retarget/Signals.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/text/Completion.h"
@@ -146,6 +147,7 @@ VProgram MakeProgram(const VRender& i_rRender)
 int Run(std::vector<std::string> i_Arguments, const VRender& i_rRender)
 {
 	LeaveNothingOnSignals();
+	AllowProgress();
 	VProgram program = MakeProgram(i_rRender);
 	if (!i_Arguments.empty() && i_Arguments.front() == "complete")
 		return Complete(*program.m_pApp, i_Arguments);

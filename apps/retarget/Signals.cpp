@@ -1,6 +1,7 @@
 #include "retarget/Signals.h"
 
 #include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/ProgressBar.h"
 
 #include "UtilsFileSystem/SaveFile.h"
 
@@ -20,6 +21,7 @@ namespace
 
 void EndBySignal(int i_Signal)
 {
+	LeaveProgress();
 	UtilsFileSystem::RemoveUnfinishedSaves();
 	// Its own handling takes effect when this returns.
 	std::signal(i_Signal, SIG_DFL);

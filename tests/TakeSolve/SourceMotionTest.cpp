@@ -1,5 +1,7 @@
 #include "Takes.h"
 
+#include <numbers>
+
 using Rotation::VMatrix3;
 using Rotation::VPose;
 using Rotation::VVector3;
@@ -183,6 +185,48 @@ TEST(SourceMotion, PerformerOfTheTakeFollowsIt)
 		for (std::size_t i = 0; i < poses.size(); ++i)
 			ExpectPose(poses[i], joints[i].R, joints[i].t, 1e-9, pTake->m_Joints[i].m_Name);
 	}
+}
+
+/// At rest the legs are splayed by 20 degrees, soles along. In the take they stand straight, ankles 100 mm up, so that
+/// the feet of the bind pose are turned by as much, about the way that they point, and the hips are at 100 + 800
+/// cos 20. The performer stands where the take's joints do all the same.
+TEST(Performer, FeetStandAsInTheTake)
+{
+	const auto joint = [](const std::string& i_rName, const std::string& i_rOffset, const std::string& i_rBelow)
+	{
+		return "JOINT " + i_rName + "\n{\nOFFSET " + i_rOffset + "\nCHANNELS 1 Yrotation\n"
+		    + (i_rBelow.empty() ? "End Site\n{\nOFFSET 0 0 1\n}\n" : i_rBelow) + "}\n";
+	};
+	std::string body = joint("Spine", "0 0 200", joint("Head", "0 0 400", ""));
+	for (const auto& [rSide, rOut] : {std::pair<std::string, std::string>{"Left", ""}, {"Right", "-"}})
+		body += joint(rSide + "UpLeg", rOut + "100 0 0",
+		    joint(rSide + "Leg", rOut + "136.80805733 0 -375.87704831",
+		        joint(rSide + "Foot", rOut + "136.80805733 0 -375.87704831", joint(rSide + "Toe", "0 -150 -50", ""))));
+	std::string text = "HIERARCHY\nROOT Hips\n{\nOFFSET 0 0 0\nCHANNELS 3 Xposition Yposition Zposition\n" + body
+	    + "}\nMOTION\nFrames: 12\nFrame Time: .01\n";
+	for (int i = 0; i < 12; ++i)
+		text += "0 0 900 0 0 20 0 0 0 -20 0 0 0\n";
+	const auto pTake = TakeOf(text);
+	const VTakePerformer performer(*pTake);
+	ExpectSound(performer.m_Record.m_SubjectParametrised);
+	std::string error;
+	const auto pMotion = TakeSolve::VSourceMotion::Make(performer.m_Subject, performer.m_BindPose, pTake, {}, error);
+	ASSERT_TRUE(pMotion) << error;
+	EXPECT_TRUE(pMotion->Findings().empty());
+	const double c = std::cos(std::numbers::pi / 9.0);
+	const double s = std::sin(std::numbers::pi / 9.0);
+	const double ankle = 100.0 + 800.0 * s;
+	ExpectPose(pMotion->BindPoses()[0], Rotation::c_Identity3, {0, 0, 100 + 800 * c}, 1e-9, "hips");
+	ExpectPose(pMotion->BindPoses()[5], {c, 0, s, 0, 1, 0, -s, 0, c}, {ankle, 0, 100}, 1e-9, "left foot");
+	ExpectPose(pMotion->BindPoses()[10], {c, 0, -s, 0, 1, 0, s, 0, c}, {50 * s - ankle, -150, 100 - 50 * c}, 1e-9,
+	    "right toe");
+	std::vector<VPose<double>> joints;
+	std::vector<VPose<double>> poses;
+	pMotion->Poses(7, joints, poses);
+	for (std::size_t i = 0; i < poses.size(); ++i)
+		ExpectPose(poses[i], joints[i].R, joints[i].t, 1e-9, pTake->m_Joints[i].m_Name);
+	const TakeSolve::VStandingPose pose = TakeSolve::StandingPose(*pTake);
+	EXPECT_NE(TextOf(pose, *pTake).find("LeftFoot is turned by 20 degrees"), std::string::npos);
 }
 
 /// Names that no file may hold or that stand there twice, a joint without channels and length, a second skeleton.

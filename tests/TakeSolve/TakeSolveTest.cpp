@@ -59,7 +59,19 @@ struct VScene
 	}
 	TakeSolve::VSolveReport Report(const VSolvedTake& i_rSolved)
 	{
-		return TakeSolve::ReportOn(m_Target, m_Performer.m_BindPose, *m_pMotion, i_rSolved);
+		TakeSolve::VSolveReport report;
+		std::size_t asked = 0;
+		EXPECT_FALSE(TakeSolve::ReportOn(
+		    m_Target, m_Performer.m_BindPose, *m_pMotion, i_rSolved,
+		    [&](std::size_t i_Done, std::size_t i_Frames)
+		    {
+			    EXPECT_EQ(i_Frames, i_rSolved.m_Frames);
+			    return (asked = i_Done) < 2;
+		    },
+		    report));
+		EXPECT_EQ(asked, 2u) << "cancelled";
+		EXPECT_TRUE(TakeSolve::ReportOn(m_Target, m_Performer.m_BindPose, *m_pMotion, i_rSolved, {}, report));
+		return report;
 	}
 	/// Where the states of a segment begin.
 	std::size_t State(const std::string& i_rName) const

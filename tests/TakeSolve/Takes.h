@@ -37,7 +37,7 @@ inline std::shared_ptr<const TakeIO::VTake> ChestTake()
 struct VTakePerformer
 {
 	explicit VTakePerformer(const TakeIO::VTake& i_rTake)
-	    : m_Record(TakeSolve::MakePerformer(i_rTake, "performer", m_Findings)),
+	    : m_Record(TakeSolve::MakePerformer(i_rTake, TakeSolve::StandingPose(i_rTake), "performer", m_Findings)),
 	      m_BindPose(CoreOrlexTypesUtils::PoseVector(
 	          m_Record.m_SubjectParametrised, &VSubjectParametrised::VJoint::m_BindPose))
 	{

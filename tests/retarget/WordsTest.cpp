@@ -2,6 +2,7 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/ProgressBar.h"
 #include "CommandLineText/Suggest.h"
 #include "CommandLineText/VisibleText.h"
 #include "retarget/subject/Elements.h"
@@ -14,10 +15,14 @@
 
 #include <boost/filesystem/operations.hpp>
 
+#include <algorithm>
+#include <cstdlib>
+#include <fcntl.h>
 #include <limits>
 #include <map>
 #include <regex>
 #include <set>
+#include <unistd.h>
 
 using namespace CommandLine;
 
@@ -90,6 +95,33 @@ void ForEachInSources(const std::vector<std::string>& i_rFolders, const std::reg
 }
 
 /// A category that is not listed could not be given a level.
+/// On a terminal. Its line is ended where a signal ends the program, and is gone where something else is told.
+TEST(ProgressBar, LeavesTheLine)
+{
+	const int master = posix_openpt(O_RDWR | O_NOCTTY);
+	ASSERT_TRUE(master >= 0 && grantpt(master) == 0 && unlockpt(master) == 0);
+	const int terminal = open(ptsname(master), O_RDWR | O_NOCTTY);
+	const int before = dup(STDERR_FILENO);
+	dup2(terminal, STDERR_FILENO);
+	setenv("TERM", "xterm", 1);
+	AllowProgress();
+	{
+		VProgressBar bar("Reading");
+		bar.Show(0.5);
+		bar.Show(0.501);
+		LeaveProgress();
+		LeaveProgress();
+		bar.Show(0.501);
+	}
+	dup2(before, STDERR_FILENO);
+	char text[1000];
+	const ssize_t count = read(master, text, sizeof text);
+	for (const int descriptor : {master, terminal, before})
+		close(descriptor);
+	const std::string bar = "\rReading " + std::string(20, '#') + std::string(20, '.') + "  50 %";
+	EXPECT_EQ(std::string(text, std::size_t(std::max<ssize_t>(count, 0))), bar + "\r\n" + bar + "\r\x1b[K");
+}
+
 TEST(Messages, AllCategoriesAreKnown)
 {
 	std::set<std::string> found;

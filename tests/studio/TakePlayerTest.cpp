@@ -32,7 +32,8 @@ VSubjectParametrised Follower()
 	std::string error;
 	EXPECT_TRUE(TakeIO::ReadTake(c_Take.toStdString(), {}, take, error)) << error;
 	std::vector<TakeSolve::VFinding> findings;
-	VSubjectParametrised subject = TakeSolve::MakePerformer(take, "hero", findings).m_SubjectParametrised;
+	VSubjectParametrised subject =
+	    TakeSolve::MakePerformer(take, TakeSolve::StandingPose(take), "hero", findings).m_SubjectParametrised;
 	subject.m_Markers.clear();
 	for (std::uint32_t i = 0; i < subject.m_Segments.size(); ++i)
 	{

@@ -19,9 +19,6 @@
 
 #include <boost/filesystem/operations.hpp>
 
-#include <cstdio>
-#include <unistd.h>
-
 namespace CommandLine
 {
 namespace
@@ -56,31 +53,6 @@ std::string ParseFrames(const std::string& i_rText, VSolveSettings& io_rSettings
 	    && parse(text.substr(colon == std::string::npos ? 0 : colon + 1), io_rSettings.m_What.m_LastFrame);
 	return bFine ? std::string() : "\"" + i_rText + "\" is not FIRST:LAST, two numbers of frames";
 }
-
-/// On a terminal a bar that goes when the work is done; nothing elsewhere.
-class VProgressBar
-{
-public:
-	~VProgressBar()
-	{
-		if (m_Shown >= 0)
-			std::fputs("\r\x1b[K", stderr);
-	}
-	void Show(std::size_t i_Done, std::size_t i_All)
-	{
-		const int percent = int(100 * i_Done / i_All);
-		if (!m_bTerminal || percent == m_Shown)
-			return;
-		m_Shown = percent;
-		std::string bar(std::size_t(percent / 2), '#');
-		bar.resize(50, '.');
-		std::fprintf(stderr, "\r%s %3d %%", bar.c_str(), percent);
-	}
-
-private:
-	bool m_bTerminal = HasColours(STDERR_FILENO);
-	int m_Shown = -1;
-};
 
 /// The targets that are off by more than they may.
 std::string BeyondLimits(const VSolveSettings& i_rSettings, const VSolveResult& i_rResult)
@@ -142,12 +114,7 @@ EExitStatus Solve(VSolveSettings i_Settings)
 
 	if (i_rSettings.m_Skins.empty())
 		session.LoadTarget(i_rSettings.m_What.m_Subject);
-	std::unique_ptr<const VPlayedTake> pPlayed;
-	{
-		VProgressBar bar;
-		pPlayed = PlayTake(session, i_rSettings.m_What,
-		    [&bar](std::size_t i_Solved, std::size_t i_Frames) { bar.Show(i_Solved, i_Frames); });
-	}
+	const std::unique_ptr<const VPlayedTake> pPlayed = PlayTake(session, i_rSettings.m_What);
 	const VSolveResult result = pPlayed->Result();
 
 	if (!i_Settings.m_Motion.m_Path.empty())

@@ -113,7 +113,8 @@ py::tuple Performer(const VPythonTake& i_rTake)
 	    [&]
 	    {
 		    std::vector<TakeSolve::VFinding> findings;
-		    file.m_Record = TakeSolve::MakePerformer(*i_rTake.m_pTake, StemOf(i_rTake.m_Path), findings);
+		    file.m_Record = TakeSolve::MakePerformer(
+		        *i_rTake.m_pTake, TakeSolve::StandingPose(*i_rTake.m_pTake), StemOf(i_rTake.m_Path), findings);
 		    for (const TakeSolve::VFinding& rFinding : findings)
 			    NVX_LOG("retarget", NVX::ELogWarning, "%1%", rFinding.m_Message);
 	    });

@@ -2,6 +2,7 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/ProgressBar.h"
 #include "retarget/subject/TakeFile.h"
 
 #include "ComputeSubjectFK/ConstructionException.h"
@@ -24,7 +25,10 @@ VSubjectParametrised PerformerOf(const VTakeToPlay& i_rWhat, VSession& io_rSessi
 	if (io_rSession.Document().SourceValues().m_pParametrised)
 		return io_rSession.Source("posing it");
 	std::vector<TakeSolve::VFinding> findings;
-	auto record = TakeSolve::MakePerformer(i_rTake, StemOf(i_rWhat.m_Take), findings);
+	const TakeSolve::VStandingPose pose = TakeSolve::StandingPose(i_rTake);
+	auto record = TakeSolve::MakePerformer(i_rTake, pose, StemOf(i_rWhat.m_Take), findings);
+	if (const std::string text = TextOf(pose, i_rTake); !text.empty())
+		NVX_LOG(c_pCategory, NVX::ELogInformation, "%1%", text);
 	for (const TakeSolve::VFinding& rFinding : findings)
 		NVX_LOG(c_pCategory, NVX::ELogWarning, "%1%", rFinding.m_Message);
 	return std::move(record.m_SubjectParametrised);
@@ -49,17 +53,15 @@ VPlayedTake::VPlayedTake(const VSubjectParametrised& i_rSource, const VSubjectPa
 {
 }
 
-std::unique_ptr<const VPlayedTake> PlayTake(
-    VSession& io_rSession, const VTakeToPlay& i_rWhat, const std::function<void(std::size_t, std::size_t)>& i_rProgress)
+std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat)
 {
 	const TakeSolve::VSourceSettings pairs = ReadPairs(*i_rWhat.m_pPairs);
 	return PlayTake(io_rSession, i_rWhat,
-	    std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rWhat.m_Take, *i_rWhat.m_pTake)), pairs, i_rProgress);
+	    std::make_shared<const TakeIO::VTake>(ReadTakeFile(i_rWhat.m_Take, *i_rWhat.m_pTake)), pairs);
 }
 
 std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
-    std::shared_ptr<const TakeIO::VTake> i_pTake, const TakeSolve::VSourceSettings& i_rPairs,
-    const std::function<void(std::size_t, std::size_t)>& i_rProgress)
+    std::shared_ptr<const TakeIO::VTake> i_pTake, const TakeSolve::VSourceSettings& i_rPairs)
 {
 	const VSubjectParametrised performer = PerformerOf(i_rWhat, io_rSession, *i_pTake);
 	auto pPlayed = std::make_unique<VPlayedTake>(performer, io_rSession.Target(), i_pTake);
@@ -90,16 +92,15 @@ std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeTo
 	if (!bAny)
 		throw VCommandError(
 		    EBadInput, "No target can be solved with this performer. " + rSolve.Findings().front().m_Message);
-	TakeSolve::SolveFrames(
-	    *pPlayed->m_Solve, first, last,
-	    [&](std::size_t i_Solved, std::size_t i_Frames)
-	    {
-		    if (i_rProgress)
-			    i_rProgress(i_Solved, i_Frames);
-		    return true;
-	    },
-	    pPlayed->m_Solved);
-	pPlayed->m_Report = TakeSolve::ReportOn(rTarget.m_Subject, rTarget.m_BindPose, *pMotion, pPlayed->m_Solved);
+	VProgressBar bar("Solving");
+	const auto progress = [&bar](std::size_t i_Done, std::size_t i_Frames)
+	{
+		bar.Show(double(i_Done) / double(i_Frames));
+		return true;
+	};
+	TakeSolve::SolveFrames(*pPlayed->m_Solve, first, last, progress, pPlayed->m_Solved);
+	TakeSolve::ReportOn(
+	    rTarget.m_Subject, rTarget.m_BindPose, *pMotion, pPlayed->m_Solved, progress, pPlayed->m_Report);
 	const auto& rNamed = io_rSession.Document().TargetValues().m_pApplicationData->m_Targets;
 	for (std::size_t i = 0; i < rTarget.m_Subject.m_Targets.size(); ++i)
 		pPlayed->m_TargetNames.push_back(i < rNamed.size() ? rNamed[i].m_Name : std::string());

@@ -8,7 +8,6 @@
 #include "TakeSolve/PosedSubject.h"
 
 #include <cstddef>
-#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -52,12 +51,10 @@ struct VPlayedTake
 };
 
 /// Throws VCommandError where a file is no good, frames are none of the take's, or there is nothing to solve.
-/// @param i_rProgress called with the frames that are solved, and all of them
-std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
-    const std::function<void(std::size_t, std::size_t)>& i_rProgress = {});
+/// A bar shows how far it is.
+std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat);
 /// The same with a take and its pairs that are there already.
 std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
-    std::shared_ptr<const TakeIO::VTake> i_pTake, const TakeSolve::VSourceSettings& i_rPairs,
-    const std::function<void(std::size_t, std::size_t)>& i_rProgress = {});
+    std::shared_ptr<const TakeIO::VTake> i_pTake, const TakeSolve::VSourceSettings& i_rPairs);
 
 } // namespace CommandLine

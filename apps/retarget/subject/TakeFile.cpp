@@ -3,6 +3,7 @@
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Parsing.h"
+#include "CommandLineText/ProgressBar.h"
 #include "retarget/subject/SetupFile.h"
 #include "retarget/text/InputFile.h"
 
@@ -161,7 +162,14 @@ VTake ReadTakeFile(const std::string& i_rPath, const VTakeSettings& i_rSettings)
 {
 	VTake take;
 	std::string error;
-	if (!ReadTake(InputPath(i_rPath, Limits::c_FileBytes).string(), i_rSettings, take, error))
+	VProgressBar bar("Reading");
+	VTakeSettings settings = i_rSettings;
+	settings.m_Progress = [&bar](double i_Part)
+	{
+		bar.Show(i_Part);
+		return true;
+	};
+	if (!ReadTake(InputPath(i_rPath, Limits::c_FileBytes).string(), settings, take, error))
 		throw VCommandError(EBadInput, "\"" + i_rPath + "\" could not be read as a take. " + error);
 	RequireNoErrors();
 	return take;

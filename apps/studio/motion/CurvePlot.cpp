@@ -31,7 +31,7 @@ const QColor c_Colours[] = {QColor(0x6cb0f2), QColor(0xf2a65a), QColor(0x8fd175)
 
 } // namespace
 
-VCurvePlot::VCurvePlot(const QString& i_rLeft, const QString& i_rRight, QWidget* i_pParent)
+VCurvePlot::VCurvePlot(const QString& i_rBottom, const QString& i_rLeft, const QString& i_rRight, QWidget* i_pParent)
     : QWidget(i_pParent), m_pPlot(new QwtPlot(this))
 {
 	auto* const pLayout = new QHBoxLayout(this);
@@ -53,7 +53,7 @@ VCurvePlot::VCurvePlot(const QString& i_rLeft, const QString& i_rRight, QWidget*
 	{
 		m_pPlot->setAxisFont(axis, font());
 		m_pPlot->axisWidget(axis)->setMargin(2);
-		title.setText(axis == QwtPlot::yLeft ? i_rLeft : axis == QwtPlot::yRight ? i_rRight : QString());
+		title.setText(axis == QwtPlot::yLeft ? i_rLeft : axis == QwtPlot::yRight ? i_rRight : i_rBottom);
 		m_pPlot->setAxisTitle(axis, title);
 	}
 	m_pPlot->insertLegend(new QwtLegend, QwtPlot::TopLegend);

@@ -26,7 +26,7 @@ public:
 		bool m_bRight = false;
 	};
 
-	VCurvePlot(const QString& i_rLeft, const QString& i_rRight, QWidget* i_pParent = nullptr);
+	VCurvePlot(const QString& i_rBottom, const QString& i_rLeft, const QString& i_rRight, QWidget* i_pParent = nullptr);
 
 	/// @param i_Last where the axis at the bottom ends; it begins at 0.
 	void SetCurves(const QVector<VCurve>& i_rCurves, double i_Last);

@@ -4,50 +4,17 @@
 #include "studio/motion/TakePlayer.h"
 #include "studio/window/Named.h"
 
+#include <QTransform>
+
 #include <algorithm>
 #include <cmath>
 #include <numbers>
 
 namespace StudioHost
 {
-namespace
-{
-
-/// More than a screen has columns: of a longer take each gets the least and the greatest of its frames.
-constexpr std::size_t c_Bins = 2000;
-
-QPolygonF Curve(const TakeSolve::VSolvedTake& i_rSolved, std::size_t i_Target, double i_Factor)
-{
-	const auto value = [&](std::size_t i_Frame)
-	{ return i_Factor * i_rSolved.m_Residuals[i_Frame * i_rSolved.m_NumberOfTargets + i_Target]; };
-	const std::size_t frames = i_rSolved.m_Frames;
-	const std::size_t bins = std::min(frames, c_Bins);
-	QPolygonF points;
-	points.reserve(int(2 * bins));
-	for (std::size_t bin = 0; bin < bins; ++bin)
-	{
-		const std::size_t first = bin * frames / bins;
-		const std::size_t end = (bin + 1) * frames / bins;
-		std::size_t least = first, greatest = first;
-		// Frames without a residual are none that is less.
-		for (std::size_t frame = first + 1; frame < end; ++frame)
-		{
-			least = value(frame) < value(least) || std::isnan(value(least)) ? frame : least;
-			greatest = value(frame) > value(greatest) || std::isnan(value(greatest)) ? frame : greatest;
-		}
-		if (std::isnan(value(least)))
-			continue;
-		points << QPointF(double(std::min(least, greatest)), value(std::min(least, greatest)));
-		if (least != greatest)
-			points << QPointF(double(std::max(least, greatest)), value(std::max(least, greatest)));
-	}
-	return points;
-}
-
-} // namespace
 
 VResidualPlot::VResidualPlot(VTakePlayer& i_rPlayer, const VResidualModel& i_rModel, QWidget* i_pParent)
-    : VCurvePlot(tr("mm"), QStringLiteral("°"), i_pParent), m_rPlayer(i_rPlayer), m_rModel(i_rModel)
+    : VCurvePlot(tr("Frame"), tr("mm"), QStringLiteral("°"), i_pParent), m_rPlayer(i_rPlayer), m_rModel(i_rModel)
 {
 	Named(this, "ResidualPlot", tr("How far the chosen targets are off over the take"));
 	setToolTip(tr("Click or drag to look at a frame; a dot is the worst one of its target"));
@@ -64,7 +31,7 @@ void VResidualPlot::Choose(std::vector<int> i_Targets)
 	if (m_Targets == i_Targets)
 		return;
 	m_Targets = std::move(i_Targets);
-	m_pDrawn.reset();
+	m_bDrawn = false;
 	Draw();
 }
 
@@ -94,8 +61,10 @@ void VResidualPlot::Draw()
 {
 	const auto& rpJudged = m_rPlayer.Judged();
 	// What was drawn stays until the next is solved; progress alone changes nothing.
-	if (m_rPlayer.IsJudging() || rpJudged == m_pDrawn)
+	const bool bSame = !m_pDrawn.owner_before(rpJudged) && !rpJudged.owner_before(m_pDrawn);
+	if (m_rPlayer.IsJudging() || (m_bDrawn && bSame))
 		return;
+	m_bDrawn = true;
 	m_pDrawn = rpJudged;
 	QVector<VCurve> curves;
 	for (const int target : rpJudged ? Shown() : std::vector<int>())
@@ -105,7 +74,8 @@ void VResidualPlot::Draw()
 			continue;
 		const bool bRotation = m_rModel.IsRotation(target);
 		const double factor = bRotation ? 180.0 / std::numbers::pi : 1.0;
-		curves << VCurve{m_rModel.Name(target), Curve(rpJudged->m_Solved, std::size_t(target), factor),
+		curves << VCurve{m_rModel.Name(target),
+		    QTransform::fromScale(1.0, factor).map(rpJudged->m_Curves[std::size_t(target)]),
 		    QPointF(double(rQuality.m_MaxFrame), factor * rQuality.m_Max), bRotation};
 	}
 	SetCurves(curves, double(std::max<std::size_t>(m_rPlayer.Frames(), 2) - 1));

@@ -31,7 +31,9 @@ private:
 	VTakePlayer& m_rPlayer;
 	const VResidualModel& m_rModel;
 	std::vector<int> m_Targets;
-	std::shared_ptr<const VJudgedTake> m_pDrawn;
+	/// Not held: what was solved before is large, and is given back by the thread that solves.
+	std::weak_ptr<const VJudgedTake> m_pDrawn;
+	bool m_bDrawn = false;
 };
 
 } // namespace StudioHost

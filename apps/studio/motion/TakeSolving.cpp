@@ -1,6 +1,7 @@
 #include "studio/motion/TakeSolving.h"
 
 #include "ComputeSubjectFK/ConstructionException.h"
+#include "DebugServices/GlobalLog.h"
 #include "TakeIO/ReadTake.h"
 #include "TakeSolve/FreePose.h"
 #include "TakeSolve/Performer.h"
@@ -8,7 +9,10 @@
 #include <QStringList>
 
 #include <algorithm>
+#include <cmath>
 #include <new>
+#include <sys/resource.h>
+#include <unistd.h>
 #include <utility>
 
 namespace StudioHost
@@ -18,8 +22,41 @@ namespace
 
 /// How often the progress of a sequence is told.
 constexpr std::size_t c_ProgressSteps = 200;
+/// Of the thread. A core that it wants alone is its own; of one that the window wants, too, it gets a quarter.
+constexpr int c_Niceness = 5;
 /// Its name is shown over it.
 constexpr const char* c_pMadePerformer = "Performer";
+
+/// More than a screen has columns: of a longer take each gets the least and the greatest of its frames.
+constexpr std::size_t c_Bins = 2000;
+
+QPolygonF CurveOf(const TakeSolve::VSolvedTake& i_rSolved, std::size_t i_Target)
+{
+	const auto value = [&](std::size_t i_Frame)
+	{ return i_rSolved.m_Residuals[i_Frame * i_rSolved.m_NumberOfTargets + i_Target]; };
+	const std::size_t frames = i_rSolved.m_Frames;
+	const std::size_t bins = std::min(frames, c_Bins);
+	QPolygonF points;
+	points.reserve(int(2 * bins));
+	for (std::size_t bin = 0; bin < bins; ++bin)
+	{
+		const std::size_t first = bin * frames / bins;
+		const std::size_t end = (bin + 1) * frames / bins;
+		std::size_t least = first, greatest = first;
+		// Frames without a residual are none that is less.
+		for (std::size_t frame = first + 1; frame < end; ++frame)
+		{
+			least = value(frame) < value(least) || std::isnan(value(least)) ? frame : least;
+			greatest = value(frame) > value(greatest) || std::isnan(value(greatest)) ? frame : greatest;
+		}
+		if (std::isnan(value(least)))
+			continue;
+		points << QPointF(double(std::min(least, greatest)), value(std::min(least, greatest)));
+		if (least != greatest)
+			points << QPointF(double(std::max(least, greatest)), value(std::max(least, greatest)));
+	}
+	return points;
+}
 
 } // namespace
 
@@ -103,6 +140,8 @@ void VTakeSolving::Tell(const std::atomic<std::uint64_t>& i_rLast, std::uint64_t
 void VTakeSolving::Run(std::stop_token i_Stop)
 {
 	m_Stop = std::move(i_Stop);
+	// The window draws, in software with threads of its own, what this solves beside it; a refusal changes nothing.
+	setpriority(PRIO_PROCESS, id_t(gettid()), c_Niceness);
 	std::unique_lock lock(m_Mutex);
 	while (m_Wake.wait(lock, m_Stop, [this] { return m_Request.m_Path || m_Request.m_Task || m_Request.m_Frame; }))
 	{
@@ -183,7 +222,10 @@ void VTakeSolving::Prepare(VSolveTask i_Task, std::uint64_t i_Number)
 			if (!i_Task.m_pSource)
 			{
 				std::vector<TakeSolve::VFinding> ofMaking;
-				made = TakeSolve::MakePerformer(*i_Task.m_pTake, c_pMadePerformer, ofMaking);
+				const TakeSolve::VStandingPose pose = TakeSolve::StandingPose(*i_Task.m_pTake);
+				made = TakeSolve::MakePerformer(*i_Task.m_pTake, pose, c_pMadePerformer, ofMaking);
+				if (const std::string text = TextOf(pose, *i_Task.m_pTake); !text.empty())
+					NVX_LOG("Motion", NVX::ELogInformation, "%1%", text);
 				for (const TakeSolve::VFinding& rFinding : ofMaking)
 					findings << QString::fromStdString(rFinding.m_Message);
 				rNow.m_pSourceData = std::make_shared<const CoreOrlexTypes::VSubjectApplicationData>(
@@ -256,18 +298,27 @@ void VTakeSolving::Judge()
 	VJudgedTake& rJudged = *rNow.m_pSequence;
 	rJudged.m_Of = rNow.m_Task;
 	rJudged.m_pTarget = rNow.m_pTarget;
-	if (!TakeSolve::SolveFrames(
-	        *rNow.m_pForSequence, 0, rNow.m_Task.m_pTake->m_Frames - 1,
-	        [this](std::size_t i_Solved, std::size_t i_Frames) { return BetweenFrames(i_Solved, i_Frames); },
-	        rJudged.m_Solved))
+	const auto solving = [this](std::size_t i_Solved, std::size_t i_Frames)
+	{
+		if (i_Solved % std::max<std::size_t>(1, i_Frames / c_ProgressSteps) == 0)
+			Tell(m_TaskNumber, m_pPrepared->m_Number,
+			    [this, i_Solved, i_Frames] { emit progressed(int(i_Solved), int(i_Frames)); });
+		return BetweenFrames();
+	};
+	const auto judging = [this](std::size_t, std::size_t) { return BetweenFrames(); };
+	if (!TakeSolve::SolveFrames(*rNow.m_pForSequence, 0, rNow.m_Task.m_pTake->m_Frames - 1, solving, rJudged.m_Solved)
+	    || !TakeSolve::ReportOn(rNow.m_pTarget->m_Subject, rNow.m_pTarget->m_BindPose, *rNow.m_pMotion,
+	        rJudged.m_Solved, judging, rJudged.m_Report))
 		return;
-	rJudged.m_Report =
-	    TakeSolve::ReportOn(rNow.m_pTarget->m_Subject, rNow.m_pTarget->m_BindPose, *rNow.m_pMotion, rJudged.m_Solved);
+	for (std::size_t i = 0; i < rJudged.m_Solved.m_NumberOfTargets && BetweenFrames(); ++i)
+		rJudged.m_Curves.push_back(CurveOf(rJudged.m_Solved, i));
+	if (rJudged.m_Curves.size() < rJudged.m_Solved.m_NumberOfTargets)
+		return;
 	Tell(m_TaskNumber, rNow.m_Number,
 	    [this, pJudged = std::shared_ptr<const VJudgedTake>(rNow.m_pSequence)] { emit judged(pJudged); });
 }
 
-bool VTakeSolving::BetweenFrames(std::size_t i_Solved, std::size_t i_Frames)
+bool VTakeSolving::BetweenFrames()
 {
 	std::unique_lock lock(m_Mutex);
 	const bool bOther = m_Request.m_Path || m_Request.m_Task;
@@ -276,9 +327,6 @@ bool VTakeSolving::BetweenFrames(std::size_t i_Solved, std::size_t i_Frames)
 	lock.unlock();
 	if (frame)
 		MakePicture(*frame);
-	if (i_Solved % std::max<std::size_t>(1, i_Frames / c_ProgressSteps) == 0)
-		Tell(m_TaskNumber, m_pPrepared->m_Number,
-		    [this, i_Solved, i_Frames] { emit progressed(int(i_Solved), int(i_Frames)); });
 	return bGoesOn;
 }
 

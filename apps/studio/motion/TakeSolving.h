@@ -7,6 +7,7 @@
 #include "TakeSolve/TakeSolve.h"
 
 #include <QObject>
+#include <QPolygonF>
 #include <QString>
 
 #include <atomic>
@@ -56,12 +57,15 @@ struct VJudgedTake
 	std::shared_ptr<const TakeSolve::VPosedSubject> m_pTarget;
 	TakeSolve::VSolvedTake m_Solved;
 	TakeSolve::VSolveReport m_Report;
+	/// By targets, residuals over the frames for a plot: of a long take the least and the greatest of some thousand
+	/// parts. A hundred thousand frames are more than a window gathers in passing.
+	std::vector<QPolygonF> m_Curves;
 };
 
-/// Reads takes and solves them on a thread of its own. What is asked for last counts: a new task ends the one before, a
-/// picture that was asked for and not made yet gives way to the next one. Between two frames of the sequence there is
-/// time for a picture. A file that is to be read ends the sequence.
-/// Signals come on the thread that made this, and only of the task and the file that were asked for last.
+/// Reads takes and solves them on a thread of its own, of less priority than the window's. What is asked for last
+/// counts: a new task ends the one before, a picture that was asked for and not made yet gives way to the next one.
+/// Between two frames of the sequence there is time for a picture. A file that is to be read ends the sequence. Signals
+/// come on the thread that made this, and only of the task and the file that were asked for last.
 class VTakeSolving : public QObject
 {
 	Q_OBJECT
@@ -108,8 +112,9 @@ private:
 	void Prepare(VSolveTask i_Task, std::uint64_t i_Number);
 	void Judge();
 	void MakePicture(std::size_t i_Frame);
+	/// Makes the picture that is asked for.
 	/// @return whether the sequence goes on.
-	bool BetweenFrames(std::size_t i_Solved, std::size_t i_Frames);
+	bool BetweenFrames();
 	/// Runs it on the thread of this object, unless the number has been raised by then.
 	template <typename TTell>
 	void Tell(const std::atomic<std::uint64_t>& i_rLast, std::uint64_t i_Number, TTell i_Tell);

@@ -1,5 +1,7 @@
 #include "studio/panel/RecentFiles.h"
 
+#include "studio/panel/FileKind.h"
+
 #include <QFileInfo>
 
 namespace StudioHost
@@ -19,10 +21,19 @@ VRecentFiles::VRecentFiles(QSettings& i_rSettings)
 
 void VRecentFiles::Add(const QString& i_rPath)
 {
-	const QString path = QFileInfo(i_rPath).absoluteFilePath();
+	PutInFront(QFileInfo(i_rPath).absoluteFilePath());
+}
+
+void VRecentFiles::AddTake(const QString& i_rPath)
+{
+	PutInFront((KindOf(i_rPath) == EFileKind::ETake ? "" : c_pAsTake) + QFileInfo(i_rPath).absoluteFilePath());
+}
+
+void VRecentFiles::PutInFront(const QString& i_rFile)
+{
 	QStringList files = m_Files;
-	files.removeAll(path);
-	files.prepend(path);
+	files.removeAll(i_rFile);
+	files.prepend(i_rFile);
 	Set(files.mid(0, c_Count));
 }
 

@@ -18,10 +18,13 @@ public:
 	/// @param i_rSettings must outlive this.
 	explicit VRecentFiles(QSettings& i_rSettings);
 
+	/// Paths; before one that was opened as a take, though its kind is another, stands c_pAsTake.
 	const QStringList& Files() const { return m_Files; }
+	static constexpr const char* c_pAsTake = "take:";
 
 	/// Puts a file in front, wherever it stood.
 	void Add(const QString& i_rPath);
+	void AddTake(const QString& i_rPath);
 	void Remove(const QString& i_rPath);
 	void Clear();
 
@@ -29,6 +32,7 @@ signals:
 	void changed();
 
 private:
+	void PutInFront(const QString& i_rFile);
 	void Set(QStringList i_Files);
 
 	QSettings& m_rSettings;

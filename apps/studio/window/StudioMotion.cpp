@@ -56,13 +56,7 @@ void VStudioWindow::MakeMotionDock()
 		    if (m_pRetargetPanel)
 			    m_pRetargetPanel->SetViewInUse(Motion().IsShown());
 	    });
-	connect(&Motion(), &VTakePlayer::opened, this,
-	    [this](const QString& i_rPath)
-	    {
-		    // An FBX file would be opened as the character's.
-		    if (KindOf(i_rPath) == EFileKind::ETake)
-			    m_pRecentFiles->Add(i_rPath);
-	    });
+	connect(&Motion(), &VTakePlayer::opened, m_pRecentFiles.get(), &VRecentFiles::AddTake);
 }
 
 VTakePlayer& VStudioWindow::Motion()
@@ -104,7 +98,8 @@ void VStudioWindow::MakePerformer()
 	const QString path = dialog.selectedFiles().value(0);
 	// What it lacks was told when it began to play.
 	std::vector<TakeSolve::VFinding> findings;
-	auto record = TakeSolve::MakePerformer(*Motion().Take(), name.toStdString(), findings);
+	auto record = TakeSolve::MakePerformer(
+	    *Motion().Take(), TakeSolve::StandingPose(*Motion().Take()), name.toStdString(), findings);
 	record.m_SubjectParametrised.m_Model = record.m_SubjectParametrised.m_Name;
 	std::string text, error;
 	std::vector<std::string> errors, warnings;

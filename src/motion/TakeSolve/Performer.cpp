@@ -70,7 +70,8 @@ void SetExpressions(const VVector3& i_rValues, std::array<std::string, 3>& o_rTe
 		o_rTexts[i] = NumberText::PrintG17(i_rValues[i]);
 }
 
-void AddSegment(const VJoint& i_rJoint, std::uint32_t i_Parent, const std::string& i_rName,
+/// @param i_rPose the joint's in the bind pose, to its parent.
+void AddSegment(const VJoint& i_rJoint, const VWorldPose& i_rPose, std::uint32_t i_Parent, const std::string& i_rName,
     const std::string& i_rJointName, CoreOrlexTypes::VSubjectRecord& io_rRecord)
 {
 	VSubjectParametrised& rSubject = io_rRecord.m_SubjectParametrised;
@@ -80,7 +81,6 @@ void AddSegment(const VJoint& i_rJoint, std::uint32_t i_Parent, const std::strin
 	segment.m_ParentSegmentIndex = i_Parent;
 	const bool bRoot = i_Parent == CoreOrlexTypes::c_NoParent;
 	segment.m_TreeDepth = bRoot ? 0 : rSubject.m_Segments[i_Parent].m_TreeDepth + 1;
-	const VVector3 turn = Rotation::AngleAxisFromRotationMatrix(i_rJoint.m_Rest.R);
 
 	VSubjectJoint& rJoint = segment.m_Joint;
 	rJoint.m_Name = i_rJointName;
@@ -88,14 +88,20 @@ void AddSegment(const VJoint& i_rJoint, std::uint32_t i_Parent, const std::strin
 	rJoint.m_JointType = bRoot ? VSubjectJoint::EFree : bFixed ? VSubjectJoint::EDummy : VSubjectJoint::EBall;
 	if (bRoot)
 	{
+		const VVector3 turn = Rotation::AngleAxisFromRotationMatrix(i_rPose.R);
 		rJoint.m_BindPose.assign(turn.begin(), turn.end());
-		rJoint.m_BindPose.insert(rJoint.m_BindPose.end(), i_rJoint.m_Rest.t.begin(), i_rJoint.m_Rest.t.end());
+		rJoint.m_BindPose.insert(rJoint.m_BindPose.end(), i_rPose.t.begin(), i_rPose.t.end());
 	}
 	else
 	{
-		SetExpressions(turn, segment.m_PreRotation);
+		SetExpressions(Rotation::AngleAxisFromRotationMatrix(i_rJoint.m_Rest.R), segment.m_PreRotation);
 		SetExpressions(i_rJoint.m_Rest.t, segment.m_PreTranslation);
 		rJoint.m_BindPose.assign(CoreOrlexTypes::StateSize(rJoint.m_JointType), 0.0);
+		// Equal ones leave nothing that rounding made.
+		if (!bFixed && i_rPose.R != i_rJoint.m_Rest.R)
+			std::ranges::copy(Rotation::AngleAxisFromRotationMatrix(
+			                      Rotation::Product(Rotation::Transposed(i_rJoint.m_Rest.R), i_rPose.R)),
+			    rJoint.m_BindPose.begin());
 	}
 	rJoint.m_Mean = rJoint.m_BindPose;
 	rJoint.m_Covariance = CoreOrlexTypes::DefaultCovariance(rJoint.m_JointType);
@@ -138,26 +144,30 @@ std::uint32_t AddMarker(const std::string& i_rName, std::uint32_t i_Segment, con
 	return index;
 }
 
-/// Of the lowest joint or end of a bone below a root, in the rest pose.
-double LowestPoint(const VTake& i_rTake, const VTrees& i_rTrees, std::size_t i_Root)
+/// Of the lowest joint or end of a bone below a root.
+double LowestPoint(
+    const VTake& i_rTake, const std::vector<VWorldPose>& i_rLocal, const VTrees& i_rTrees, std::size_t i_Root)
 {
 	std::vector<VWorldPose> poses;
-	TakeIO::WorldRestPoses(i_rTake, poses);
-	double lowest = poses[i_Root].t[2];
-	for (std::size_t i = 0; i < poses.size(); ++i)
+	double lowest = i_rLocal[i_Root].t[2];
+	for (std::size_t i = 0; i < i_rLocal.size(); ++i)
+	{
+		const std::int32_t parent = i_rTake.m_Joints[i].m_Parent;
+		poses.push_back(parent < 0 ? i_rLocal[i] : Rotation::Compose(poses[std::size_t(parent)], i_rLocal[i]));
 		if (i_rTrees.m_Roots[i] == i_Root)
 		{
 			lowest = std::min(lowest, poses[i].t[2]);
 			for (const VVector3& rEnd : i_rTake.m_Joints[i].m_Ends)
 				lowest = std::min(lowest, Rotation::Apply(poses[i], rEnd)[2]);
 		}
+	}
 	return lowest;
 }
 
 } // namespace
 
 CoreOrlexTypes::VSubjectRecord MakePerformer(
-    const VTake& i_rTake, const std::string& i_rName, std::vector<VFinding>& o_rFindings)
+    const VTake& i_rTake, const VStandingPose& i_rPose, const std::string& i_rName, std::vector<VFinding>& o_rFindings)
 {
 	CoreOrlexTypes::VSubjectRecord record;
 	VSubjectParametrised& rSubject = record.m_SubjectParametrised;
@@ -166,7 +176,7 @@ CoreOrlexTypes::VSubjectRecord MakePerformer(
 		return record;
 	const VTrees trees(i_rTake);
 	const std::size_t root = trees.Largest();
-	const double raise = std::max(0.0, -LowestPoint(i_rTake, trees, root));
+	const double raise = std::max(0.0, -LowestPoint(i_rTake, i_rPose.m_Poses, trees, root));
 
 	// A file wants all of them to differ; segments come first, since targets and takes find them by name.
 	std::set<std::string> taken;
@@ -178,19 +188,20 @@ CoreOrlexTypes::VSubjectRecord MakePerformer(
 	std::string others;
 	for (std::size_t i = 0; i < i_rTake.m_Joints.size(); ++i)
 	{
-		VJoint joint = i_rTake.m_Joints[i];
+		const VJoint& rJoint = i_rTake.m_Joints[i];
 		if (trees.m_Roots[i] != root)
 		{
-			if (joint.m_Parent < 0)
-				others += (others.empty() ? "" : ", ") + joint.m_Name;
+			if (rJoint.m_Parent < 0)
+				others += (others.empty() ? "" : ", ") + rJoint.m_Name;
 			continue;
 		}
 		const std::string& rName = names[i];
 		segments[i] = std::uint32_t(rSubject.m_Segments.size());
+		VWorldPose pose = i_rPose.m_Poses[i];
 		if (i == root)
-			joint.m_Rest.t[2] += raise;
-		const bool bBone = i != root && Length(joint.m_Rest.t) > c_NoLength;
-		AddSegment(joint, i == root ? CoreOrlexTypes::c_NoParent : segments[std::size_t(joint.m_Parent)], rName,
+			pose.t[2] += raise;
+		const bool bBone = i != root && Length(rJoint.m_Rest.t) > c_NoLength;
+		AddSegment(rJoint, pose, i == root ? CoreOrlexTypes::c_NoParent : segments[std::size_t(rJoint.m_Parent)], rName,
 		    OwnName(rName + "Joint", taken), record);
 		auto& rSticks = record.m_SubjectApplicationData.m_Sticks;
 		const auto addStick = [&](std::uint32_t i_From, std::uint32_t i_To)
@@ -200,10 +211,10 @@ CoreOrlexTypes::VSubjectRecord MakePerformer(
 		};
 		// A joint that stands where its parent does shares the parent's marker.
 		markerOf[i] = i == root || bBone ? AddMarker(OwnName(rName + "Marker", taken), segments[i], {}, record)
-		                                 : markerOf[std::size_t(joint.m_Parent)];
+		                                 : markerOf[std::size_t(rJoint.m_Parent)];
 		if (bBone)
-			addStick(markerOf[std::size_t(joint.m_Parent)], markerOf[i]);
-		for (const VVector3& rEnd : joint.m_Ends)
+			addStick(markerOf[std::size_t(rJoint.m_Parent)], markerOf[i]);
+		for (const VVector3& rEnd : rJoint.m_Ends)
 			if (Length(rEnd) > c_NoLength)
 				addStick(markerOf[i], AddMarker(OwnName(rName + "End", taken), segments[i], rEnd, record));
 	}

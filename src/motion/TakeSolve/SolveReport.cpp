@@ -311,17 +311,17 @@ std::vector<VUnequalSides> FindUnequalSides(
 
 } // namespace
 
-VSolveReport ReportOn(const VSubject& i_rTarget, std::span<const double> i_BindPose, const VSourceMotion& i_rSource,
-    const VSolvedTake& i_rSolved)
+bool ReportOn(const VSubject& i_rTarget, std::span<const double> i_BindPose, const VSourceMotion& i_rSource,
+    const VSolvedTake& i_rSolved, const VSolveProgress& i_rProgress, VSolveReport& o_rReport)
 {
-	VSolveReport report;
+	o_rReport = {};
 	for (std::size_t i = 0; i < i_rSolved.m_NumberOfTargets; ++i)
-		report.m_Targets.push_back(QualityOf(i_rSolved, i));
+		o_rReport.m_Targets.push_back(QualityOf(i_rSolved, i));
 	for (std::size_t i = 0; i < i_rSolved.m_Frames; ++i)
 		if (!i_rSolved.m_Converged[i])
-			report.m_NotConverged.push_back(i_rSolved.m_First + i);
-	report.m_MedianTime = Percentile(i_rSolved.m_Milliseconds, 0.5);
-	report.m_P95Time = Percentile(i_rSolved.m_Milliseconds, 0.95);
+			o_rReport.m_NotConverged.push_back(i_rSolved.m_First + i);
+	o_rReport.m_MedianTime = Percentile(i_rSolved.m_Milliseconds, 0.5);
+	o_rReport.m_P95Time = Percentile(i_rSolved.m_Milliseconds, 0.95);
 
 	const ComputeSubject::VSegmentTree tree = ComputeSubject::MakeSegmentTree(i_rTarget);
 	VPoses target(tree.size());
@@ -337,12 +337,12 @@ VSolveReport ReportOn(const VSubject& i_rTarget, std::span<const double> i_BindP
 	std::vector<double> bindPose(i_rSolved.m_NumberOfStates, 0.0);
 	std::copy_n(i_BindPose.begin(), std::min(i_BindPose.size(), bindPose.size()), bindPose.begin());
 	if (tree.empty() || i_rSolved.m_Frames == 0)
-		return report;
+		return true;
 	pose(bindPose);
 	const VRestSkeleton skeleton = SkeletonOf(i_rTarget, target);
 	const VProposal proposal = Propose(i_rSource.RestSkeleton(), skeleton);
-	report.m_BindPoses = CheckPose(i_rSource.RestSkeleton(), skeleton, proposal);
-	report.m_Sides = FindUnequalSides(i_rTarget, skeleton, report.m_Targets);
+	o_rReport.m_BindPoses = CheckPose(i_rSource.RestSkeleton(), skeleton, proposal);
+	o_rReport.m_Sides = FindUnequalSides(i_rTarget, skeleton, o_rReport.m_Targets);
 
 	std::vector<VFoot> feet;
 	std::vector<VBend> bends;
@@ -373,20 +373,22 @@ VSolveReport ReportOn(const VSubject& i_rTarget, std::span<const double> i_BindP
 		for (VBend& rBend : bends)
 			rBend.Add(source, target);
 		jumps.Add(i_rSolved.m_First + i, source, target);
+		if (i_rProgress && !i_rProgress(i + 1, i_rSolved.m_Frames))
+			return false;
 	}
 	std::vector<double> standing;
 	for (VFoot& rFoot : feet)
 		rFoot.FindStanding(i_rSource.Take().m_Rate, standing);
-	report.m_Floor = Percentile(standing, 0.5);
+	o_rReport.m_Floor = Percentile(standing, 0.5);
 	for (VFoot& rFoot : feet)
-		report.m_Feet.push_back(rFoot.Quality(i_rSolved.m_First, report.m_Floor));
+		o_rReport.m_Feet.push_back(rFoot.Quality(i_rSolved.m_First, o_rReport.m_Floor));
 	for (const VBend& rBend : bends)
-		report.m_Bends.push_back(rBend.Quality());
-	report.m_Jumps = jumps.Largest();
+		o_rReport.m_Bends.push_back(rBend.Quality());
+	o_rReport.m_Jumps = jumps.Largest();
 	for (std::size_t i = 0; i < i_rSolved.m_EndsOfRanges.size(); ++i)
 		if (i_rSolved.m_EndsOfRanges[i] > 0)
-			report.m_Ranges.push_back({i, i_rSolved.m_EndsOfRanges[i]});
-	return report;
+			o_rReport.m_Ranges.push_back({i, i_rSolved.m_EndsOfRanges[i]});
+	return true;
 }
 
 } // namespace TakeSolve

@@ -107,7 +107,9 @@ struct VSolveReport
 
 /// @param i_rTarget, i_BindPose as the frames were solved for. Which segments are feet, knees and elbows is told by
 /// SetupProposal.
-VSolveReport ReportOn(const CoreOrlexTypes::VSubject& i_rTarget, std::span<const double> i_BindPose,
-    const VSourceMotion& i_rSource, const VSolvedTake& i_rSolved);
+/// @return false if it was cancelled; there is no report then.
+bool ReportOn(const CoreOrlexTypes::VSubject& i_rTarget, std::span<const double> i_BindPose,
+    const VSourceMotion& i_rSource, const VSolvedTake& i_rSolved, const VSolveProgress& i_rProgress,
+    VSolveReport& o_rReport);
 
 } // namespace TakeSolve

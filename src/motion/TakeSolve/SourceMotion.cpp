@@ -21,6 +21,8 @@ using TakeIO::VTake;
 constexpr double c_ToldArc = 5.0 / c_Degrees;
 /// Where bones at rest point so far apart, the pair is most likely wrong: arms that hang are 90 degrees off a T-pose.
 constexpr double c_Contradiction = 120.0 / c_Degrees;
+/// Bones that point as much alike are those of one skeleton.
+constexpr double c_SameDirection = 0.5 / c_Degrees;
 /// Joints that are closer have no direction between them, in mm.
 constexpr double c_SamePlace = 1.0;
 /// Frames that the scale is the median of; of a longer take as many, evenly spread.
@@ -94,14 +96,26 @@ std::shared_ptr<const VSourceMotion> VSourceMotion::Make(const VSubject& i_rSour
 		states += rpSegment->NumberOfStates();
 	std::vector<double> bindPose(states, 0.0);
 	std::copy_n(i_BindPose.begin(), std::min(i_BindPose.size(), states), bindPose.begin());
-	const double* pState = bindPose.data();
+	const auto pose = [&tree](const std::vector<double>& i_rStates, std::vector<VWorldPose>& o_rPoses,
+	                      std::vector<VVector3>& o_rCentres)
+	{
+		const double* pState = i_rStates.data();
+		for (const auto& rpSegment : tree)
+		{
+			rpSegment->Update(pState);
+			o_rPoses.push_back(rpSegment->SegmentPose());
+			o_rCentres.push_back(rpSegment->WorldPose().t);
+		}
+	};
+	pose(bindPose, rMotion.m_BindPoses, rMotion.m_Centres);
+	std::ranges::fill(bindPose.begin() + std::ptrdiff_t(tree.front()->NumberOfStates()), bindPose.end(), 0.0);
+	std::vector<VWorldPose> atZero;
+	std::vector<VVector3> centresAtZero;
+	pose(bindPose, atZero, centresAtZero);
 	for (std::size_t i = 0; i < tree.size(); ++i)
 	{
-		tree[i]->Update(pState);
 		const VSubject::VSegment& rSegment = i_rSource.m_Segments[i];
 		rMotion.m_Names.push_back(rSegment.m_Name);
-		rMotion.m_BindPoses.push_back(tree[i]->SegmentPose());
-		rMotion.m_Centres.push_back(tree[i]->WorldPose().t);
 		VLink link;
 		link.m_Parent = i == 0 ? -1 : std::int64_t(rSegment.m_ParentSegmentIndex);
 		rMotion.m_Links.push_back(link);
@@ -129,12 +143,39 @@ std::shared_ptr<const VSourceMotion> VSourceMotion::Make(const VSubject& i_rSour
 	     i = rMotion.m_Links[std::size_t(i)].m_Parent)
 		rMotion.m_Above[std::size_t(i)] = true;
 
-	rMotion.FindArcs(rest, !i_rSettings.m_RestFrame);
+	if (!i_rSettings.m_RestFrame && rMotion.StandsAs(rest, centresAtZero))
+		rMotion.FindArcs(rest, atZero, centresAtZero, true);
+	else
+		rMotion.FindArcs(rest, rMotion.m_BindPoses, rMotion.m_Centres, !i_rSettings.m_RestFrame);
 	rMotion.FindScale();
 	return pMotion;
 }
 
-void VSourceMotion::FindArcs(const std::vector<VWorldPose>& i_rRest, bool i_bArcs)
+std::int64_t VSourceMotion::DrivenAbove(std::size_t i_Segment) const
+{
+	std::int64_t above = m_Links[i_Segment].m_Parent;
+	while (above >= 0 && m_Joints[std::size_t(above)] < 0)
+		above = m_Links[std::size_t(above)].m_Parent;
+	return above;
+}
+
+bool VSourceMotion::StandsAs(const std::vector<VWorldPose>& i_rRest, const std::vector<VVector3>& i_rCentres) const
+{
+	for (std::size_t i = 0; i < m_Links.size(); ++i)
+	{
+		const std::int64_t above = m_Joints[i] >= 0 ? DrivenAbove(i) : -1;
+		if (above >= 0
+		    && AngleBetween(Difference(i_rCentres[i], i_rCentres[std::size_t(above)]),
+		           Difference(
+		               i_rRest[std::size_t(m_Joints[i])].t, i_rRest[std::size_t(m_Joints[std::size_t(above)])].t))
+		        > c_SameDirection)
+			return false;
+	}
+	return true;
+}
+
+void VSourceMotion::FindArcs(const std::vector<VWorldPose>& i_rRest, const std::vector<VWorldPose>& i_rReference,
+    const std::vector<VVector3>& i_rCentres, bool i_bArcs)
 {
 	const double facing = Facing(SkeletonOf(*m_pTake, i_rRest), m_Rest);
 	const VMatrix3 turned = Rotation::RotationMatrixFromAngleAxis({0.0, 0.0, facing});
@@ -145,26 +186,19 @@ void VSourceMotion::FindArcs(const std::vector<VWorldPose>& i_rRest, bool i_bArc
 
 	const std::size_t count = m_Links.size();
 	const auto bindDirection = [&](std::size_t i_From, std::size_t i_To)
-	{ return Difference(m_Centres[i_To], m_Centres[i_From]); };
+	{ return Difference(i_rCentres[i_To], i_rCentres[i_From]); };
 	const auto restDirection = [&](std::size_t i_From, std::size_t i_To)
 	{ return Difference(i_rRest[std::size_t(m_Joints[i_To])].t, i_rRest[std::size_t(m_Joints[i_From])].t); };
 	const auto bApart = [&](std::size_t i_From, std::size_t i_To)
 	{ return std::min(Length(bindDirection(i_From, i_To)), Length(restDirection(i_From, i_To))) > c_SamePlace; };
-	const auto drivenAbove = [&](std::size_t i_Segment)
-	{
-		std::int64_t above = m_Links[i_Segment].m_Parent;
-		while (above >= 0 && m_Joints[std::size_t(above)] < 0)
-			above = m_Links[std::size_t(above)].m_Parent;
-		return above;
-	};
 	// Where the bones of a segment lead to: the next driven ones below, beyond those that stand where it does.
 	std::vector<std::vector<std::size_t>> ends(count);
 	for (std::size_t i = 0; i < count; ++i)
 		if (m_Joints[i] >= 0)
-			for (std::int64_t above = drivenAbove(i), below = std::int64_t(i);
+			for (std::int64_t above = DrivenAbove(i), below = std::int64_t(i);
 			     above >= 0 && (below == std::int64_t(i) || !bApart(std::size_t(above), std::size_t(below)))
 			     && bApart(std::size_t(above), i);
-			     below = above, above = drivenAbove(std::size_t(above)))
+			     below = above, above = DrivenAbove(std::size_t(above)))
 				ends[std::size_t(above)].push_back(i);
 
 	std::vector<VMatrix3> corrections(count, turned);
@@ -210,13 +244,13 @@ void VSourceMotion::FindArcs(const std::vector<VWorldPose>& i_rRest, bool i_bArc
 		else if (m_Joints[i] < 0)
 			corrections[i] = rAbove;
 
-		// R(frame) R(rest)' correction bind.
+		// R(frame) R(rest)' correction reference.
 		const VMatrix3& rBind = m_BindPoses[i].R;
 		m_Links[i].m_Offset =
 		    Rotation::Product(Rotation::Transposed(rBind), Difference(m_BindPoses[i].t, m_Centres[i]));
 		if (m_Joints[i] >= 0)
-			m_Links[i].m_Turn = Rotation::Product(
-			    Rotation::Transposed(i_rRest[std::size_t(m_Joints[i])].R), Rotation::Product(corrections[i], rBind));
+			m_Links[i].m_Turn = Rotation::Product(Rotation::Transposed(i_rRest[std::size_t(m_Joints[i])].R),
+			    Rotation::Product(corrections[i], i_rReference[i].R));
 		if (parent < 0)
 			continue;
 		const VWorldPose& rParent = m_BindPoses[std::size_t(parent)];

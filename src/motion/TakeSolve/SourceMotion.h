@@ -37,7 +37,10 @@ struct VSourceSettings
 /// with the one above, those above the first driven one with that. The way of the first driven segment is the take's,
 /// times the ratio of the distances from there to the lowest joint, the median over the frames.
 ///
-/// Where the rest poses differ, a bone that leads to one other keeps the direction that the take gives it. Of one that
+/// A performer whose joints at zero are the take's rest pose, bone by bone, is of the same skeleton: there the two are
+/// one, whatever the bind pose is. Else the bind pose is related to the rest pose.
+///
+/// Where these differ, a bone that leads to one other keeps the direction that the take gives it. Of one that
 /// leads to several, or to none, no arc is known: it takes that of the one above where its bones fit better with it,
 /// and what is left is told. A performer who faces another way at rest is turned first.
 ///
@@ -72,7 +75,15 @@ public:
 
 private:
 	VSourceMotion() = default;
-	void FindArcs(const std::vector<Rotation::VPose<double>>& i_rRest, bool i_bArcs);
+	/// The driven segment that one hangs on, -1 for none.
+	std::int64_t DrivenAbove(std::size_t i_Segment) const;
+	/// Whether all bones between driven segments point as the take's at rest.
+	bool StandsAs(
+	    const std::vector<Rotation::VPose<double>>& i_rRest, const std::vector<Rotation::VVector3>& i_rCentres) const;
+	/// @param i_rReference, i_rCentres the pose of the segments, and of their joints, that is the take's at rest.
+	void FindArcs(const std::vector<Rotation::VPose<double>>& i_rRest,
+	    const std::vector<Rotation::VPose<double>>& i_rReference, const std::vector<Rotation::VVector3>& i_rCentres,
+	    bool i_bArcs);
 	void FindScale();
 
 	/// How a segment hangs on the one above.

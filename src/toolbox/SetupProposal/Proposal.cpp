@@ -31,9 +31,10 @@ VWeights WeightsFor(EBodyPart i_Part)
 {
 	switch (i_Part)
 	{
-	case EPelvis: return {1.0, 1.0};
-	case EHand:
-	case EFoot: return {1.0, 1.0};
+	case EPelvis:
+	case EHand: return {1.0, 1.0};
+	// Arms of other lengths pull at the pelvis; feet stay where they stand all the same.
+	case EFoot: return {4.0, 1.0};
 	case EHead: return {0.5, 1.0};
 	case ESpine:
 	case ENeck:
