@@ -39,6 +39,9 @@ TEST(RecentFiles, TheLastTenNewestFirst)
 	EXPECT_EQ(again.Files(),
 	    (QStringList{"/f/5.qrr", "/f/11.qrr", "/f/10.qrr", "/f/9.qrr", "/f/7.qrr", "/f/6.qrr", "/f/4.qrr", "/f/3.qrr",
 	        "/f/2.qrr"}));
+	again.AddTake("/f/run.fbx");
+	again.AddTake("/f/run.bvh");
+	EXPECT_EQ(again.Files().mid(0, 2), (QStringList{"/f/run.bvh", "take:/f/run.fbx"}));
 	again.Clear();
 	EXPECT_TRUE(VRecentFiles(scratch.m_Settings).Files().isEmpty());
 }

@@ -544,6 +544,12 @@ TEST_F(Job, AlignsToTheSourceWithAPreview)
 	{
 		auto& rDialog = *m_pWindow->findChild<QWidget*>("AlignToSource");
 		auto& rTable = *rDialog.findChild<QTableWidget*>("AlignedJoints");
+		for (const char* const pHow : {"leans as the shin does", "keeps its tilt"})
+		{
+			press("AlignToSource", "AlignFeet");
+			EXPECT_TRUE(
+			    rTable.item(rTable.findItems("hockLeft", Qt::MatchExactly).value(0)->row(), 5)->text().contains(pHow));
+		}
 		const auto row = [&] { return rTable.findItems("upperArmLeft", Qt::MatchExactly).value(0)->row(); };
 		const auto isLocked = [&] { return rTable.item(row(), 5)->text().contains("locked"); };
 		for (const bool bLocked : {true, false})

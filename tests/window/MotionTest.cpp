@@ -22,6 +22,7 @@
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QLabel>
+#include <QMenu>
 #include <QTableView>
 #include <QTest>
 #include <QToolButton>
@@ -196,6 +197,34 @@ TEST_F(Motion, IsPlayedJudgedAndLeavesTheDocument)
 	Press("TakeExport");
 	EXPECT_TRUE(Widget<QLabel>("TakeFile").text().contains("Choose its FBX file")) << "a skin is missing";
 	EXPECT_FALSE(QFile::exists(File("hero.glb")));
+	m_pWindow->Open(File("character.fbx"));
+	for (const char* const pName : {"hero.glb", "hero.fbx"})
+	{
+		EXPECT_EVENTUALLY(Widget<QToolButton>("TakeExport").isEnabled());
+		m_pOperator->AnswerNextDialog(File(pName));
+		Press("TakeExport");
+		EXPECT_EVENTUALLY(QFile::exists(File(pName))) << Widget<QLabel>("TakeFile").text().toStdString();
+	}
+	QFile binary(File("hero.glb"));
+	ASSERT_TRUE(binary.open(QIODevice::ReadOnly));
+	const QByteArray bytes = binary.readAll();
+	EXPECT_TRUE(bytes.startsWith("glTF") && bytes.contains("\"animations\"") && bytes.contains("\"skins\""));
+	TakeIO::VTakeSettings ofSway;
+	ofSway.m_Stack = "sway";
+	ofSway.m_Rate = 30.0;
+	EXPECT_TRUE(TakeIO::ReadTake(File("hero.fbx").toStdString(), ofSway, written, error)) << error;
+	EXPECT_EQ(written.m_Frames, c_Frames - in);
+	// It is a character's file, too; as a take it is opened as one again.
+	m_pWindow->OpenTake(File("hero.fbx"));
+	EXPECT_EVENTUALLY(Player().Path() == File("hero.fbx") && Player().AtRest());
+	m_pWindow->OpenTake(File("sway.bvh"));
+	EXPECT_EVENTUALLY(Player().Path() == File("sway.bvh") && Player().AtRest());
+	const QList<QAction*> recent = m_pWindow->findChild<QMenu*>("RecentMenu")->actions();
+	ASSERT_TRUE(recent.value(1) && recent[1]->text().endsWith("hero.fbx (take)"));
+	recent[1]->trigger();
+	EXPECT_EVENTUALLY(Player().Path() == File("hero.fbx") && Player().AtRest());
+	m_pWindow->OpenTake(File("sway.bvh"));
+	EXPECT_EVENTUALLY(Player().Path() == File("sway.bvh") && Player().AtRest());
 
 	Press("TakeStop");
 	m_pOperator->WaitForDrawing();

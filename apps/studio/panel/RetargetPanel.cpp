@@ -371,12 +371,13 @@ void VRetargetPanel::AddTargets(const QVariantList& i_rTargets)
 }
 
 QVariantMap VRetargetPanel::AlignToSource(
-    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale)
+    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale, bool i_bFeetWithShins)
 {
 	ApplyTyped();
 	QVariantMap aligned;
 	QMetaObject::invokeMethod(m_pDocument, "AlignToSource", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, aligned),
-	    Q_ARG(QVariantList, i_rChains), Q_ARG(QVariantList, i_rLocked), Q_ARG(bool, i_bFitScale));
+	    Q_ARG(QVariantList, i_rChains), Q_ARG(QVariantList, i_rLocked), Q_ARG(bool, i_bFitScale),
+	    Q_ARG(bool, i_bFeetWithShins));
 	return aligned;
 }
 

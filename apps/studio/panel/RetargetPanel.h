@@ -94,7 +94,8 @@ public:
 	/// In one step.
 	void AddTargets(const QVariantList& i_rTargets);
 	// The document's functions of these names.
-	QVariantMap AlignToSource(const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale);
+	QVariantMap AlignToSource(
+	    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale, bool i_bFeetWithShins);
 	bool IsAligning() const;
 	void EndAlignment(bool i_bKeep);
 	QVariantMap LookAtRebind(bool i_bPerformer) const;

@@ -84,6 +84,10 @@ VAlignDialog::VAlignDialog(
 		m_Chains.push_back(pBox);
 	}
 	pChains->addStretch();
+	m_pFeet = Named(new QCheckBox(tr("&Feet with the shins")), "AlignFeet", tr("Feet with the shins"));
+	m_pFeet->setToolTip(tr("Feet lean as the shins do, for a performer whose soles do: else they keep their tilt"));
+	connect(m_pFeet, &QCheckBox::toggled, this, &VAlignDialog::Align);
+	pChains->addWidget(m_pFeet);
 	m_pFitScale->setChecked(true);
 	connect(m_pFitScale, &QCheckBox::clicked, this, &VAlignDialog::Align);
 	auto* const pButtons = Named(
@@ -118,7 +122,7 @@ bool VAlignDialog::Align()
 	for (const int segment : m_Locked)
 		locked << segment;
 	m_bAtWork = true;
-	const QVariantMap aligned = m_rPanel.AlignToSource(chains, locked, m_pFitScale->isChecked());
+	const QVariantMap aligned = m_rPanel.AlignToSource(chains, locked, m_pFitScale->isChecked(), m_pFeet->isChecked());
 	m_bAtWork = false;
 	const QVariantList joints = aligned["joints"].toList();
 	{

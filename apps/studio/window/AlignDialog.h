@@ -53,6 +53,7 @@ private:
 	std::vector<QCheckBox*> m_Chains;
 	/// Whether the character is scaled to the performer; on at first.
 	QCheckBox* const m_pFitScale;
+	QCheckBox* m_pFeet = nullptr;
 	/// Segments of the character that keep their joints.
 	std::set<int> m_Locked;
 	QTableWidget* const m_pTable;

@@ -32,6 +32,7 @@
 #include <QUrl>
 #include <QVBoxLayout>
 
+#include <cstring>
 #include <tuple>
 
 static void InitialiseHelp()
@@ -390,12 +391,18 @@ void VStudioWindow::UpdateRecentFiles()
 	for (const QString& rFile : m_pRecentFiles->Files())
 	{
 		++number;
+		const bool bTake = rFile.startsWith(QLatin1String(VRecentFiles::c_pAsTake));
+		const QString path = bTake ? rFile.mid(int(std::strlen(VRecentFiles::c_pAsTake))) : rFile;
 		// A "&" in a name is no mnemonic.
-		const QString text = QStringLiteral("&%1  %2").arg(number % 10).arg(QString(rFile).replace('&', "&&"));
+		const QString text = QStringLiteral("&%1  %2%3")
+		                         .arg(number % 10)
+		                         .arg(QString(path).replace('&', "&&"), bTake ? tr(" (take)") : QString());
 		AddAction(*m_pRecentMenu, "RecentFile", text, {},
-		    [this, rFile]
+		    [this, rFile, path, bTake]
 		    {
-			    if (!Open(rFile))
+			    if (bTake && QFileInfo::exists(path))
+				    OpenTake(path);
+			    else if (bTake || !Open(path))
 				    m_pRecentFiles->Remove(rFile);
 		    });
 	}

@@ -70,12 +70,13 @@ public:
 	/// @param i_rLocked segments of the target subject whose joints stay.
 	/// @param i_bFitScale scales it first, with the height of its root, so that its hips come to stand as high as the
 	/// source's, where they do not.
+	/// @param i_bFeetWithShins feet lean as the shins do; else they keep their tilt.
 	/// @return "joints", a list of maps: "target", "source", "before", "after" in degrees, "note"; "turn" in degrees,
 	/// "move" and "lift" in mm, "refused", a list of sentences; "scale", what would fit or does, 1 where there is
 	/// nothing to fit, "scaled", and "heights", a sentence on hips. Empty if there is no change, which commandIgnored
 	/// tells.
 	Q_INVOKABLE QVariantMap AlignToSource(
-	    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale);
+	    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale, bool i_bFeetWithShins);
 	/// What it has made is still there.
 	Q_INVOKABLE bool IsAligning() const;
 	/// @param i_bKeep false: the pose before it comes back, unless the target subject has become another one since.

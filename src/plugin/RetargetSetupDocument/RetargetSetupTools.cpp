@@ -163,7 +163,7 @@ bool VRetargetSetup::IsAligning() const
 }
 
 QVariantMap VRetargetSetup::AlignToSource(
-    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale)
+    const QVariantList& i_rChains, const QVariantList& i_rLocked, bool i_bFitScale, bool i_bFeetWithShins)
 {
 	if (IsAligning())
 		Restore(m_BeforeAlignment, {RetargetSetup::Steps::c_Align, m_Alignment});
@@ -179,6 +179,7 @@ QVariantMap VRetargetSetup::AlignToSource(
 	choice.m_bArms = i_rChains.value(1).toBool();
 	choice.m_bLegs = i_rChains.value(2).toBool();
 	choice.m_bOthers = i_rChains.value(3).toBool();
+	choice.m_bFeetWithShins = i_bFeetWithShins;
 	const auto pTarget = TargetValues().m_pParametrised;
 	for (const QVariant& rSegment : i_rLocked)
 		if (const int segment = rSegment.toInt(); pTarget && segment >= 0 && segment < int(pTarget->m_Segments.size()))
