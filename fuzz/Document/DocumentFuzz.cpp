@@ -143,7 +143,10 @@ void Command(VRetargetSetup& io_rDocument, FuzzedDataProvider& io_rInput)
 	case 10: return io_rDocument.MatchFilePose();
 	case 11: io_rDocument.ProposeTargets(number()); return;
 	case 12: return io_rDocument.AddTargets({target(), target()});
-	case 13: io_rDocument.AlignToSource({true, true, true, true}, {index()}, io_rInput.ConsumeBool()); return;
+	case 13:
+		io_rDocument.AlignToSource(
+		    {true, true, true, true}, {index()}, io_rInput.ConsumeBool(), io_rInput.ConsumeBool());
+		return;
 	case 14: return io_rDocument.EndAlignment(io_rInput.ConsumeBool());
 	case 15:
 	{
