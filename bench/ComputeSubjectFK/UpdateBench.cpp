@@ -230,6 +230,46 @@ void KDLChain(benchmark::State& io_rState)
 	Report(io_rState);
 }
 
+constexpr std::size_t c_Frames = 240;
+
+/// Ten seconds of a take, by i_Compute(kinematics, states, poses out).
+template <typename TCompute>
+void Frames(benchmark::State& io_rState, TCompute i_Compute)
+{
+	ComputeSubject::VComputeSubjectFK fk(Chain(io_rState.range(0)));
+	const std::vector<double> states = State(c_Frames * fk.NumberOfStates());
+	std::vector<Rotation::VPose<double>> poses(c_Frames * fk.NumberOfSegments());
+	for (auto _ : io_rState)
+	{
+		i_Compute(fk, states, poses);
+		benchmark::DoNotOptimize(poses.data());
+		benchmark::ClobberMemory();
+	}
+}
+
+void UpdateEach(benchmark::State& io_rState)
+{
+	Frames(io_rState,
+	    [](ComputeSubject::VComputeSubjectFK& io_rFK, const auto& i_rStates, auto& o_rPoses)
+	    {
+		    auto pose = o_rPoses.begin();
+		    for (std::size_t frame = 0; frame < c_Frames; ++frame)
+		    {
+			    io_rFK.Update(&i_rStates[frame * io_rFK.NumberOfStates()]);
+			    for (std::size_t i = 0; i < io_rFK.NumberOfSegments(); ++i)
+				    io_rFK.Segment(i).SegmentPose(*pose++);
+		    }
+	    });
+}
+
+template <unsigned c_Threads>
+void UpdateMany(benchmark::State& io_rState)
+{
+	Frames(io_rState,
+	    [](const ComputeSubject::VComputeSubjectFK& i_rFK, const auto& i_rStates, auto& o_rPoses)
+	    { i_rFK.UpdateMany(i_rStates, o_rPoses, c_Threads); });
+}
+
 void Sizes(benchmark::internal::Benchmark* io_pBenchmark)
 {
 	for (const int segments : {30, 70, 100, 300, 1000, 3000})
@@ -239,10 +279,17 @@ void Sizes(benchmark::internal::Benchmark* io_pBenchmark)
 BENCHMARK(Floor)->Apply(Sizes);
 BENCHMARK(Update)->Apply(Sizes);
 BENCHMARK(KDLChain)->Apply(Sizes);
+BENCHMARK(UpdateEach)->Arg(70)->Arg(300);
+BENCHMARK(UpdateMany<1>)->Name("UpdateMany")->Arg(70)->Arg(300);
+BENCHMARK(UpdateMany<1>)->Name("UpdateManyAlone")->Arg(70)->Arg(300)->UseRealTime();
+BENCHMARK(UpdateMany<2>)->Name("UpdateManyTwoThreads")->Arg(70)->Arg(300)->UseRealTime();
 
 } // namespace
 
 int main(int i_Count, char** i_ppArguments)
 {
-	return Ratios::Main(i_Count, i_ppArguments, {{"Update", "Floor", 1.0}, {"Update", "KDLChain", 0.35}});
+	return Ratios::Main(i_Count, i_ppArguments,
+	    {{"Update", "Floor", 0.6, {"30", "70", "100", "300", "1000"}}, {"Update", "Floor", 0.8, {"3000"}},
+	        {"Update", "KDLChain", 0.35}, {"UpdateMany", "UpdateEach", 1 / 1.8},
+	        {"UpdateManyTwoThreads", "UpdateManyAlone", 0.6}});
 }

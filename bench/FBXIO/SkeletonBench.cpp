@@ -107,7 +107,7 @@ void Work(const std::string& i_rWork, const std::string& i_rPath)
 }
 
 /// Most memory beside assimp's.
-void PrintPeaks(const std::string& i_rName, const std::string& i_rPath)
+void PrintPeaks(const std::string& i_rName, const std::string& i_rPath, bool i_bVerdict)
 {
 	const double peer = PeakMemory::Of("assimp", i_rPath);
 	for (const char* pWork : {"skeleton", "skin"})
@@ -115,6 +115,9 @@ void PrintPeaks(const std::string& i_rName, const std::string& i_rPath)
 		const double ours = PeakMemory::Of(pWork, i_rPath);
 		std::printf("peak memory, %s of %s: %.1f MiB, assimp %.1f MiB%s\n", pWork, i_rName.c_str(), ours, peer,
 		    ours < 0 || ours >= peer ? " EXCEEDED" : "");
+		if (i_bVerdict)
+			Verdict::Tell((std::string("peak memory, ") + pWork).c_str(), "assimp", i_rName,
+			    ours < 0 ? std::vector<double>{} : std::vector{ours / peer}, 1.0);
 	}
 }
 
@@ -174,6 +177,6 @@ int main(int i_Count, char** i_ppArguments)
 	}
 	const int status = Ratios::Main(i_Count, i_ppArguments, ratios);
 	for (const auto& [name, path] : files)
-		PrintPeaks(name, path);
+		PrintPeaks(name, path, Verdict::WasAskedFor(i_Count, i_ppArguments));
 	return status;
 }

@@ -109,6 +109,34 @@ TEST(SegmentFK, RandomTreesAgreeWithHomogeneousMatrices)
 	}
 }
 
+/// Many frames at once are the same numbers as one after the other, also where an angle is nothing or beyond half a
+/// turn, where a frame is left over, and on several threads.
+TEST(SegmentFK, ManyFramesAreEachAsAlone)
+{
+	std::mt19937 random(20241122);
+	for (const auto& [segments, frames, threads] : {std::array<unsigned, 3>{9, 1, 1}, {23, 7, 1}, {23, 401, 3}})
+	{
+		const VSubject subject = RandomSubject(random, segments);
+		VComputeSubjectFK fk(subject);
+		std::vector<double> states(fk.NumberOfStates(), 0.0);
+		while (states.size() < frames * fk.NumberOfStates())
+			for (const double value : RandomState(random, subject, 4.0))
+				states.push_back(value);
+		std::vector<Rotation::VPose<double>> poses(frames * segments + 1);
+		fk.UpdateMany(states, poses, threads);
+		for (std::size_t frame = 0; frame < frames; ++frame)
+		{
+			fk.Update(&states[frame * fk.NumberOfStates()]);
+			for (std::size_t i = 0; i < segments; ++i)
+			{
+				ASSERT_EQ(poses[frame * segments + i].R, fk.Segment(i).SegmentPose().R) << frame << ": " << i;
+				ASSERT_EQ(poses[frame * segments + i].t, fk.Segment(i).SegmentPose().t) << frame << ": " << i;
+			}
+		}
+		EXPECT_EQ(poses.back().R, Rotation::c_Identity3) << "what is beyond the last whole frame stays";
+	}
+}
+
 TEST(SegmentFK, NormaliseStateKeepsThePoses)
 {
 	std::mt19937 random(3);

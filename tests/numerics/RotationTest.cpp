@@ -50,6 +50,8 @@ const VAngleAxisRow c_AngleAxes[] = {
     {"JustBelowHalfATurn", {0, c_Pi - 1e-7, 0}, {0, c_Pi - 1e-7, 0}},
     {"Small", {1e-9, 0, -1e-9}, {1e-9, 0, -1e-9}},
     {"JustAboveTheSmallest", {5e-15, 0, 0}, {5e-15, 0, 0}},
+    {"LastThatIsFitted", {0, 3.16227766016837, 0}, {0, 3.16227766016837 - 2 * c_Pi, 0}},
+    {"FirstThatIsNot", {0, 3.16227766016839, 0}, {0, 3.16227766016839 - 2 * c_Pi, 0}},
     {"BeyondHalfATurn", {0, 0, 3 * c_Pi / 2}, {0, 0, -c_Pi / 2}},
 };
 

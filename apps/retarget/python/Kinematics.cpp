@@ -9,8 +9,11 @@
 
 #include <pybind11/stl.h>
 
+#include <algorithm>
 #include <limits>
 #include <mutex>
+#include <span>
+#include <thread>
 
 namespace CommandLine::Python
 {
@@ -20,7 +23,7 @@ namespace
 namespace py = pybind11;
 using VJoint = CoreOrlexTypes::VSubjectParametrised::VJoint;
 
-/// Threads of Python that use one wait for each other.
+/// Threads of Python that use one wait for each other, but for poses, which leave it as it is.
 class VPythonKinematics
 {
 public:
@@ -37,45 +40,62 @@ public:
 		return ToArray(CoreOrlexTypesUtils::PoseVector(m_Subject, i_pStatistic));
 	}
 
-	/// Fills for each row of states what a function writes for a frame, c_Size values for each of i_Count things.
+	/// Fills for each frame, a row of states, i_Count things of c_Size values: i_Fill(states, out, frames) with the
+	/// lock of the interpreter given away.
 	template <std::size_t c_Size, typename TFill>
-	VNumbers ForEachFrame(
-	    const VNumbers& i_rStates, std::size_t i_Count, std::vector<py::ssize_t> i_Shape, TFill i_Fill)
+	VNumbers ForFrames(const VNumbers& i_rStates, std::size_t i_Count, std::vector<py::ssize_t> i_Shape, TFill i_Fill)
 	{
 		const bool bOne = i_rStates.ndim() == 1;
 		if (i_rStates.ndim() < 1 || i_rStates.ndim() > 2
 		    || std::size_t(i_rStates.shape(i_rStates.ndim() - 1)) != NumberOfStates())
 			throw py::value_error("states have a row of " + std::to_string(NumberOfStates())
 			    + " numbers for each frame, or are one such row");
-		const py::ssize_t frames = bOne ? 1 : i_rStates.shape(0);
+		const auto frames = bOne ? 1 : std::size_t(i_rStates.shape(0));
 		if (!bOne)
-			i_Shape.insert(i_Shape.begin(), frames);
+			i_Shape.insert(i_Shape.begin(), py::ssize_t(frames));
 		VNumbers result(i_Shape);
-		const double* pState = i_rStates.data();
-		double* pOut = result.mutable_data();
-		Call(
-		    [&]
-		    {
-			    const std::lock_guard lock(m_Mutex);
-			    for (py::ssize_t frame = 0; frame < frames; ++frame)
-			    {
-				    m_Kinematics.Update(pState);
-				    i_Fill(pOut);
-				    pState += NumberOfStates();
-				    pOut += c_Size * i_Count;
-			    }
-		    });
+		const std::span states(i_rStates.data(), frames * NumberOfStates());
+		const std::span out(result.mutable_data(), frames * i_Count * c_Size);
+		Call([&] { i_Fill(states, out, frames); });
 		return result;
 	}
 
 	VNumbers Poses(const VNumbers& i_rStates)
 	{
 		const std::size_t count = m_Subject.m_Segments.size();
-		return ForEachFrame<16>(i_rStates, count, {py::ssize_t(count), 4, 4},
-		    [&](double* o_pOut)
+		return ForFrames<16>(i_rStates, count, {py::ssize_t(count), 4, 4},
+		    [&](std::span<const double> i_States, std::span<double> o_Out, std::size_t i_Frames)
 		    {
-			    for (std::size_t i = 0; i < count; ++i)
-				    WriteMatrix(m_Kinematics.Segment(i).SegmentPose(), o_pOut);
+			    // In parts, so that what is kept beside the result does not grow with it.
+			    constexpr std::size_t c_Part = 1024;
+			    std::vector<Rotation::VPose<double>> poses(std::min(i_Frames, c_Part) * count);
+			    double* pOut = o_Out.data();
+			    for (std::size_t first = 0; first < i_Frames; first += c_Part)
+			    {
+				    const std::size_t frames = std::min(c_Part, i_Frames - first);
+				    const std::span part(poses.data(), frames * count);
+				    m_Kinematics.UpdateMany(i_States.subspan(first * NumberOfStates()), part,
+				        std::max(1u, std::thread::hardware_concurrency()));
+				    for (const Rotation::VPose<double>& rPose : part)
+					    WriteMatrix(rPose, pOut);
+			    }
+		    });
+	}
+
+	/// i_Fill(out) writes what a frame has, after an update to it.
+	template <std::size_t c_Size, typename TFill>
+	VNumbers ForEachFrame(
+	    const VNumbers& i_rStates, std::size_t i_Count, std::vector<py::ssize_t> i_Shape, TFill i_Fill)
+	{
+		return ForFrames<c_Size>(i_rStates, i_Count, std::move(i_Shape),
+		    [&](std::span<const double> i_States, std::span<double> o_Out, std::size_t i_Frames)
+		    {
+			    const std::lock_guard lock(m_Mutex);
+			    for (std::size_t frame = 0; frame < i_Frames; ++frame)
+			    {
+				    m_Kinematics.Update(i_States.data() + frame * NumberOfStates());
+				    i_Fill(o_Out.data() + frame * c_Size * i_Count);
+			    }
 		    });
 	}
 

@@ -7,9 +7,6 @@
 namespace Rotation
 {
 
-/// Two doubles in one register, by the vector extension that g++ and clang share.
-using VPair = double __attribute__((vector_size(16)));
-
 /// A pose as the rows of the 3x4 matrix [R t], each in two pairs: the form in which composing keeps both lanes of the
 /// registers busy.
 struct VPoseRows

@@ -5,6 +5,7 @@
 
 #include <cstddef>
 #include <memory>
+#include <span>
 #include <vector>
 
 namespace CoreOrlexTypes
@@ -57,6 +58,13 @@ public:
 	/// Takes NumberOfStates() values in the order of the segments, and brings all segments and targets up to date.
 	/// Allocates nothing.
 	virtual void Update(const double* i_pState);
+
+	/// The segment frames in the world in many frames, as Update and SegmentPose give them one after the other, but
+	/// several at once. i_States holds NumberOfStates() values for each frame, o_Poses NumberOfSegments() poses; whole
+	/// frames of both, as many as both hold, are computed. Segments and targets stay as they are, so that several
+	/// threads may call it at a time; with i_Threads above 1 it uses so many itself.
+	void UpdateMany(
+	    std::span<const double> i_States, std::span<Rotation::VPose<double>> o_Poses, unsigned i_Threads = 1) const;
 
 	/// The world position of each marker: the mean of its point and group targets, by their weights. A marker without
 	/// weight is left at the origin; the result tells whether there is none. Indices beyond the list are left out.

@@ -25,6 +25,12 @@ public:
 		m_Joint.GetPose(o_rPose);
 	}
 
+	void MoveLanes(const Rotation::VLanes*& io_rpState, Rotation::VPose<Rotation::VLanes>& o_rPose) const override
+	{
+		T::Motion(io_rpState, o_rPose);
+		io_rpState += T::c_States;
+	}
+
 	std::shared_ptr<IJointFK> Clone() const override { return std::make_shared<VJointFK>(m_Joint); }
 
 private:

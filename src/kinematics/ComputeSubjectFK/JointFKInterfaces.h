@@ -49,6 +49,9 @@ public:
 	/// SetState and GetPose in one call.
 	virtual void Move(const double*& io_rpState, Rotation::VPose<double>& o_rPose) = 0;
 
+	/// The motion alone, of two frames at once; moves the pointer behind what it reads. The joint stays as it is.
+	virtual void MoveLanes(const Rotation::VLanes*& io_rpState, Rotation::VPose<Rotation::VLanes>& o_rPose) const = 0;
+
 	/// Shares nothing with this one.
 	virtual std::shared_ptr<IJointFK> Clone() const = 0;
 };

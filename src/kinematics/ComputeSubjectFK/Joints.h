@@ -33,10 +33,13 @@ private:
 };
 
 /// The part of a joint class that follows from its type and its degrees of freedom.
-template <VJointFKBase::EJointType t_Type, std::size_t t_States>
+/// TJoint::Motion(states, pose out) is the motion, of one frame (T is double) or of two at once (VLanes).
+template <typename TJoint, VJointFKBase::EJointType t_Type, std::size_t t_States>
 class VJointFKOfType : public VJointFKBase
 {
 public:
+	static constexpr std::size_t c_States = t_States;
+
 	explicit VJointFKOfType(const CoreOrlexTypes::VSubject::VJoint& i_rJoint) : VJointFKBase(i_rJoint, t_Type) {}
 	EJointType JointType() const override { return t_Type; }
 	std::size_t NumberOfStates() const override { return t_States; }
@@ -45,101 +48,118 @@ public:
 		for (double& rValue : m_State)
 			rValue = *io_rpState++;
 	}
+	void GetPose(Rotation::VPose<double>& o_rPose) const override { TJoint::Motion(m_State.data(), o_rPose); }
 
 protected:
 	std::array<double, t_States> m_State{};
 };
 
 /// Angle-axis, then translation.
-class VJointFKFree : public VJointFKOfType<VJointFKBase::EJointType::EFree, 6>
+class VJointFKFree : public VJointFKOfType<VJointFKFree, VJointFKBase::EJointType::EFree, 6>
 {
 public:
 	using VJointFKOfType::VJointFKOfType;
-	void GetPose(Rotation::VPose<double>& o_rPose) const override;
+	template <typename T>
+	static void Motion(const T* i_pState, Rotation::VPose<T>& o_rPose);
 	void NormaliseState(double*& io_rpState) const override;
 };
 
 /// Angle-axis.
-class VJointFKBall : public VJointFKOfType<VJointFKBase::EJointType::EBall, 3>
+class VJointFKBall : public VJointFKOfType<VJointFKBall, VJointFKBase::EJointType::EBall, 3>
 {
 public:
 	using VJointFKOfType::VJointFKOfType;
-	void GetPose(Rotation::VPose<double>& o_rPose) const override;
+	template <typename T>
+	static void Motion(const T* i_pState, Rotation::VPose<T>& o_rPose);
 	void NormaliseState(double*& io_rpState) const override;
 };
 
 /// About Z by the first angle, after about Y by the second.
-class VJointFKHardySpicer : public VJointFKOfType<VJointFKBase::EJointType::EHardySpicer, 2>
+class VJointFKHardySpicer : public VJointFKOfType<VJointFKHardySpicer, VJointFKBase::EJointType::EHardySpicer, 2>
 {
 public:
 	using VJointFKOfType::VJointFKOfType;
-	void GetPose(Rotation::VPose<double>& o_rPose) const override;
+	template <typename T>
+	static void Motion(const T* i_pState, Rotation::VPose<T>& o_rPose);
 	void NormaliseState(double*& io_rpState) const override;
 };
 
 /// About Z.
-class VJointFKHinge : public VJointFKOfType<VJointFKBase::EJointType::EHinge, 1>
+class VJointFKHinge : public VJointFKOfType<VJointFKHinge, VJointFKBase::EJointType::EHinge, 1>
 {
 public:
 	using VJointFKOfType::VJointFKOfType;
-	void GetPose(Rotation::VPose<double>& o_rPose) const override;
+	template <typename T>
+	static void Motion(const T* i_pState, Rotation::VPose<T>& o_rPose);
 	void NormaliseState(double*& io_rpState) const override;
 };
 
 /// Along Z.
-class VJointFKSlider : public VJointFKOfType<VJointFKBase::EJointType::ESlider, 1>
+class VJointFKSlider : public VJointFKOfType<VJointFKSlider, VJointFKBase::EJointType::ESlider, 1>
 {
 public:
 	using VJointFKOfType::VJointFKOfType;
-	void GetPose(Rotation::VPose<double>& o_rPose) const override;
+	template <typename T>
+	static void Motion(const T* i_pState, Rotation::VPose<T>& o_rPose);
 	void NormaliseState(double*& io_rpState) const override;
 };
 
-class VJointFKDummy : public VJointFKOfType<VJointFKBase::EJointType::EDummy, 0>
+class VJointFKDummy : public VJointFKOfType<VJointFKDummy, VJointFKBase::EJointType::EDummy, 0>
 {
 public:
 	using VJointFKOfType::VJointFKOfType;
-	void GetPose(Rotation::VPose<double>& o_rPose) const override;
+	template <typename T>
+	static void Motion(const T* i_pState, Rotation::VPose<T>& o_rPose);
 	void NormaliseState(double*& io_rpState) const override;
 };
 
-inline void VJointFKFree::GetPose(Rotation::VPose<double>& o_rPose) const
+template <typename T>
+void VJointFKFree::Motion(const T* i_pState, Rotation::VPose<T>& o_rPose)
 {
-	o_rPose.R = Rotation::RotationMatrixFromAngleAxis({m_State[0], m_State[1], m_State[2]});
-	o_rPose.t = {m_State[3], m_State[4], m_State[5]};
+	o_rPose.R = Rotation::RotationMatrixFromAngleAxis(std::array<T, 3>{i_pState[0], i_pState[1], i_pState[2]});
+	o_rPose.t = {i_pState[3], i_pState[4], i_pState[5]};
 }
 
-inline void VJointFKBall::GetPose(Rotation::VPose<double>& o_rPose) const
+template <typename T>
+void VJointFKBall::Motion(const T* i_pState, Rotation::VPose<T>& o_rPose)
 {
-	o_rPose.R = Rotation::RotationMatrixFromAngleAxis(m_State);
+	o_rPose.R = Rotation::RotationMatrixFromAngleAxis(std::array<T, 3>{i_pState[0], i_pState[1], i_pState[2]});
 	o_rPose.t = {};
 }
 
-inline void VJointFKHardySpicer::GetPose(Rotation::VPose<double>& o_rPose) const
+template <typename T>
+void VJointFKHardySpicer::Motion(const T* i_pState, Rotation::VPose<T>& o_rPose)
 {
-	const double ca = std::cos(m_State[0]);
-	const double sa = std::sin(m_State[0]);
-	const double cb = std::cos(m_State[1]);
-	const double sb = std::sin(m_State[1]);
+	using std::cos;
+	using std::sin;
+	const T ca = cos(i_pState[0]);
+	const T sa = sin(i_pState[0]);
+	const T cb = cos(i_pState[1]);
+	const T sb = sin(i_pState[1]);
 	o_rPose.R = {cb * ca, -sa, sb * ca, cb * sa, ca, sb * sa, -sb, 0.0, cb};
 	o_rPose.t = {};
 }
 
-inline void VJointFKHinge::GetPose(Rotation::VPose<double>& o_rPose) const
+template <typename T>
+void VJointFKHinge::Motion(const T* i_pState, Rotation::VPose<T>& o_rPose)
 {
-	const double c = std::cos(m_State[0]);
-	const double s = std::sin(m_State[0]);
+	using std::cos;
+	using std::sin;
+	const T c = cos(i_pState[0]);
+	const T s = sin(i_pState[0]);
 	o_rPose.R = {c, -s, 0.0, s, c, 0.0, 0.0, 0.0, 1.0};
 	o_rPose.t = {};
 }
 
-inline void VJointFKSlider::GetPose(Rotation::VPose<double>& o_rPose) const
+template <typename T>
+void VJointFKSlider::Motion(const T* i_pState, Rotation::VPose<T>& o_rPose)
 {
-	o_rPose.R = Rotation::c_Identity3;
-	o_rPose.t = {0.0, 0.0, m_State[0]};
+	o_rPose = {};
+	o_rPose.t[2] = i_pState[0];
 }
 
-inline void VJointFKDummy::GetPose(Rotation::VPose<double>& o_rPose) const
+template <typename T>
+void VJointFKDummy::Motion(const T*, Rotation::VPose<T>& o_rPose)
 {
 	o_rPose = {};
 }

@@ -116,6 +116,12 @@ void VSubjectKinematics::Update(const double* i_pState)
 	m_pKinematics->Update(i_pState);
 }
 
+void VSubjectKinematics::UpdateMany(
+    std::span<const double> i_States, std::span<Rotation::VPose<double>> o_Poses, unsigned i_Threads) const
+{
+	m_pKinematics->UpdateMany(i_States, o_Poses, i_Threads);
+}
+
 void VSubjectKinematics::ComputeMarkers(
     std::vector<Rotation::VVector3>& io_rPositions, std::vector<bool>& o_rValid) const
 {

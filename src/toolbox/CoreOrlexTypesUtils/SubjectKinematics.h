@@ -5,6 +5,7 @@
 
 #include <cstddef>
 #include <memory>
+#include <span>
 #include <vector>
 
 namespace ComputeSubject
@@ -46,6 +47,10 @@ public:
 
 	/// Takes NumberOfStates() values in the order of the segments.
 	void Update(const double* i_pState);
+
+	/// ComputeSubject::VComputeSubjectFK::UpdateMany.
+	void UpdateMany(
+	    std::span<const double> i_States, std::span<Rotation::VPose<double>> o_Poses, unsigned i_Threads = 1) const;
 
 	/// World positions of all markers, in millimetres, and world rotations of all observations, row by row; not valid,
 	/// and zero or the identity, where no target with weight tells one.
