@@ -216,8 +216,10 @@ bool VWriter::WriteText(const VSubjectParametrised& i_rSubject, const VSubjectAp
 	VWriting writing{i_rSubject, i_rApplicationData, i_rExtras, parser, VersionFromValue(i_VersionValue)};
 	if (Prepare(writing, o_rErrors))
 	{
-		UtilsRapidXml::VDocument document;
-		VWriterNode root(document);
+		// What a segment with all statistics, its marker and its target take: the text grows no more where it is large.
+		constexpr std::size_t c_BytesOfSegment = 4096;
+		o_rText.reserve(c_BytesOfSegment * i_rSubject.m_Segments.size());
+		VWriterNode root(o_rText);
 		root.SetVersion(writing.m_Version);
 		WriteElement(
 		    root, Format::KinematicModel::c_Element, [&](VWriterNode& io_rModel) { WriteModel(io_rModel, writing); });
@@ -230,7 +232,9 @@ bool VWriter::WriteText(const VSubjectParametrised& i_rSubject, const VSubjectAp
 			        .str());
 		o_rErrors = root.GetGlobalInfo()->m_Errors.GetTexts();
 		if (o_rErrors.empty())
-			o_rText = document.Print();
+			o_rText += '\n';
+		else
+			o_rText.clear();
 		if (o_rText.size() > c_MaximumFileSize)
 		{
 			o_rErrors.push_back((boost::format("The file would be larger than the %1% bytes that are read at most.",

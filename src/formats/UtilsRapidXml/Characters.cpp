@@ -12,18 +12,6 @@ bool IsPlain(char i_Byte)
 	return static_cast<signed char>(i_Byte) >= 0x20;
 }
 
-/// Bytes looked at together.
-constexpr std::size_t c_Block = 32;
-
-/// True for nearly all of any file. All bytes are looked at, whatever is found: compilers make few instructions of it.
-bool IsPlainBlock(const char* i_pBytes)
-{
-	unsigned char found = 0;
-	for (std::size_t i = 0; i < c_Block; ++i)
-		found |= static_cast<unsigned char>(!IsPlain(i_pBytes[i]));
-	return found == 0;
-}
-
 /// The length of the sequence that begins here, 0 if it is broken or no character of XML.
 std::size_t SequenceLength(std::string_view i_Text)
 {
@@ -50,8 +38,9 @@ std::size_t UtilsRapidXml::FindBrokenCharacter(std::string_view i_Text)
 	std::size_t position = 0;
 	while (position < i_Text.size())
 	{
-		const std::size_t end = std::min(position + c_Block, i_Text.size());
-		if (end - position == c_Block && IsPlainBlock(i_Text.data() + position))
+		const std::size_t end = std::min(position + sizeof(VBlock), i_Text.size());
+		const auto isNotPlain = [](VBlock i_Bytes) { return i_Bytes < 0x20; };
+		if (end - position == sizeof(VBlock) && !BlockHas(i_Text.data() + position, isNotPlain))
 			position = end;
 		while (position < end)
 		{

@@ -1,6 +1,8 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
+#include <cstring>
 #include <string_view>
 
 namespace UtilsRapidXml
@@ -11,6 +13,21 @@ constexpr bool IsXmlCharacter(char32_t i_Code)
 {
 	return (i_Code >= 0x20 && i_Code <= 0xD7FF) || i_Code == '\t' || i_Code == '\n' || i_Code == '\r'
 	    || (i_Code >= 0xE000 && i_Code <= 0xFFFD) || (i_Code >= 0x10000 && i_Code <= 0x10FFFF);
+}
+
+/// Bytes looked at together, by the vector extension that g++ and clang share.
+using VBlock = signed char __attribute__((vector_size(16)));
+
+/// Whether i_Is, which gives a block of comparisons, is true for a byte of the sizeof(VBlock) that begin here.
+template <typename TIs>
+bool BlockHas(const char* i_pBytes, TIs i_Is)
+{
+	VBlock bytes;
+	std::memcpy(&bytes, i_pBytes, sizeof bytes);
+	const VBlock is = i_Is(bytes);
+	std::uint64_t halves[2];
+	std::memcpy(halves, &is, sizeof halves);
+	return (halves[0] | halves[1]) != 0;
 }
 
 /// @return the place of the first byte that is no well-formed UTF-8 (overlong forms and surrogates included) or begins

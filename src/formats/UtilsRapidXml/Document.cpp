@@ -69,10 +69,7 @@ VXmlNode* VDocument::GetRoot()
 
 void VDocument::AppendDeclaration()
 {
-	VXmlNode* const pDeclaration = m_pContent->Append(GetRoot(), rapidxml::node_declaration, {});
-	AppendAttribute(pDeclaration, "version", "1.0");
-	AppendAttribute(pDeclaration, "encoding", "UTF-8");
-	AppendAttribute(pDeclaration, "standalone", "no");
+	m_pContent->Append(GetRoot(), rapidxml::node_declaration, {});
 }
 
 void VDocument::AppendProcessingInstruction(std::string_view i_Target, std::string_view i_Text)

@@ -1,7 +1,10 @@
 #include "UtilsRapidXml/Printer.h"
 
+#include "UtilsRapidXml/Characters.h"
+
 #include <rapidxml/rapidxml.hpp>
 
+#include <algorithm>
 #include <array>
 #include <string_view>
 
@@ -38,6 +41,20 @@ constexpr VEscapes AttributeEscapes(unsigned char i_OtherQuote)
 constexpr VEscapes c_DoubleQuotedEscapes = AttributeEscapes('\'');
 constexpr VEscapes c_SingleQuotedEscapes = AttributeEscapes('"');
 
+/// True for nearly all values: they are written as they stand, within quotes of either kind.
+bool StandsForItself(std::string_view i_Text)
+{
+	const auto isEscaped = [](const auto& i_rBytes)
+	{
+		return (i_rBytes == '<') | (i_rBytes == '>') | (i_rBytes == '&') | (i_rBytes == '"') | (i_rBytes == '\'')
+		    | (i_rBytes == '\t') | (i_rBytes == '\n') | (i_rBytes == '\r');
+	};
+	for (; i_Text.size() >= sizeof(UtilsRapidXml::VBlock); i_Text.remove_prefix(sizeof(UtilsRapidXml::VBlock)))
+		if (UtilsRapidXml::BlockHas(i_Text.data(), isEscaped))
+			return false;
+	return std::none_of(i_Text.begin(), i_Text.end(), isEscaped);
+}
+
 void AppendEscaped(std::string_view i_Text, const VEscapes& i_rEscapes, std::string& io_rText)
 {
 	std::size_t begin = 0;
@@ -55,13 +72,8 @@ void AppendEscaped(std::string_view i_Text, const VEscapes& i_rEscapes, std::str
 void AppendAttributes(const VXmlNode& i_rNode, std::string& io_rText)
 {
 	for (const auto* pAttribute = i_rNode.first_attribute(); pAttribute; pAttribute = pAttribute->next_attribute())
-	{
-		const std::string_view value(pAttribute->value(), pAttribute->value_size());
-		const char quote = value.find('"') == std::string_view::npos ? '"' : '\'';
-		((io_rText += ' ').append(pAttribute->name(), pAttribute->name_size()) += '=') += quote;
-		AppendEscaped(value, quote == '"' ? c_DoubleQuotedEscapes : c_SingleQuotedEscapes, io_rText);
-		io_rText += quote;
-	}
+		UtilsRapidXml::PrintAttribute(
+		    {pAttribute->name(), pAttribute->name_size()}, {pAttribute->value(), pAttribute->value_size()}, io_rText);
 }
 
 /// Writes a node without its children.
@@ -73,9 +85,7 @@ bool Open(const VXmlNode& i_rNode, std::size_t i_Depth, std::string& io_rText)
 	io_rText.append(i_Depth, '\t');
 	if (i_rNode.type() == rapidxml::node_declaration)
 	{
-		io_rText += "<?xml";
-		AppendAttributes(i_rNode, io_rText);
-		io_rText += "?>\n";
+		io_rText += UtilsRapidXml::c_Declaration;
 		return false;
 	}
 	if (i_rNode.type() == rapidxml::node_pi)
@@ -103,6 +113,20 @@ bool Open(const VXmlNode& i_rNode, std::size_t i_Depth, std::string& io_rText)
 }
 
 } // namespace
+
+void UtilsRapidXml::PrintAttribute(std::string_view i_Name, std::string_view i_Value, std::string& io_rText)
+{
+	(io_rText += ' ') += i_Name;
+	if (StandsForItself(i_Value))
+	{
+		((io_rText += "=\"") += i_Value) += '"';
+		return;
+	}
+	const char quote = i_Value.find('"') == std::string_view::npos ? '"' : '\'';
+	(io_rText += '=') += quote;
+	AppendEscaped(i_Value, quote == '"' ? c_DoubleQuotedEscapes : c_SingleQuotedEscapes, io_rText);
+	io_rText += quote;
+}
 
 std::string UtilsRapidXml::Print(const VXmlNode& i_rDocument)
 {

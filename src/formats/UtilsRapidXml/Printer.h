@@ -3,6 +3,7 @@
 #include "UtilsRapidXml/Document.h"
 
 #include <string>
+#include <string_view>
 
 namespace UtilsRapidXml
 {
@@ -11,5 +12,11 @@ namespace UtilsRapidXml
 /// tabs of attributes, which are written as character references. It copies whole runs of bytes where the printer goes
 /// byte by byte, and it does not recurse.
 std::string Print(const VXmlNode& i_rDocument);
+
+/// The declaration of version 1.0, UTF-8, not standalone, with which every text of ours begins.
+inline constexpr std::string_view c_Declaration = "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\"?>\n";
+
+/// An attribute of an element that is open, as Print writes it.
+void PrintAttribute(std::string_view i_Name, std::string_view i_Value, std::string& io_rText);
 
 } // namespace UtilsRapidXml

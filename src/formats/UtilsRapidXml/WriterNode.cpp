@@ -1,32 +1,60 @@
 #include "UtilsRapidXml/WriterNode.h"
 
+#include "UtilsRapidXml/Characters.h"
 #include "UtilsRapidXml/Limits.h"
+#include "UtilsRapidXml/Printer.h"
+
+#include <algorithm>
+#include <utility>
 
 namespace UtilsRapidXml
 {
 
-VWriterNode::VWriterNode(VDocument& i_rDocument)
-    : VWriterNode(i_rDocument, i_rDocument.GetRoot(), {}, 0, std::make_shared<VGlobalInfo>())
+VWriterNode::VWriterNode(std::string& o_rText) : VWriterNode(o_rText, {}, 0, std::make_shared<VGlobalInfo>())
 {
-	i_rDocument.AppendDeclaration();
+	o_rText = c_Declaration;
+	// It has no tag of its own that would have to be ended.
+	m_bHasChildren = true;
 }
 
-VWriterNode::VWriterNode(VDocument& i_rDocument, VXmlNode* i_pElement, std::string_view i_Name, std::size_t i_Depth,
-    std::shared_ptr<VGlobalInfo> i_pGlobal)
-    : m_rDocument(i_rDocument), m_pElement(i_pElement), m_Name(i_Name), m_Depth(i_Depth),
-      m_pGlobal(std::move(i_pGlobal))
+VWriterNode::VWriterNode(
+    std::string& io_rText, std::string_view i_Name, std::size_t i_Depth, std::shared_ptr<VGlobalInfo> i_pGlobal)
+    : m_rText(io_rText), m_Name(i_Name), m_Depth(i_Depth), m_pGlobal(std::move(i_pGlobal))
 {
+}
+
+void VWriterNode::Open()
+{
+	(m_rText.append(m_Depth - 1, '\t') += '<') += m_Name;
+	m_AttributesEnd = m_rText.size();
+}
+
+void VWriterNode::Close()
+{
+	if (m_bHasChildren)
+		((m_rText.append(m_Depth - 1, '\t') += "</") += m_Name) += ">\n";
+	else
+		m_rText += "/>\n";
 }
 
 bool VWriterNode::WriteAttribute(
     std::string_view i_Name, std::string_view i_Text, VVersion i_Minimum, VVersion i_Maximum)
 {
-	if (!InRange(GetVersion(), i_Minimum, i_Maximum))
+	// The document itself has no attributes.
+	if (m_Depth == 0 || !InRange(GetVersion(), i_Minimum, i_Maximum))
 		return false;
-	if (m_rDocument.AppendAttribute(m_pElement, i_Name, i_Text))
-		return true;
-	m_pGlobal->m_Errors.Add("%1% node's %2% attribute has bytes that XML cannot hold.", m_Name, i_Name);
-	return false;
+	if (FindBrokenCharacter(i_Text) != std::string_view::npos)
+	{
+		m_pGlobal->m_Errors.Add("%1% node's %2% attribute has bytes that XML cannot hold.", m_Name, i_Name);
+		return false;
+	}
+	const std::size_t end = m_rText.size();
+	PrintAttribute(i_Name, i_Text, m_rText);
+	if (m_bHasChildren)
+		std::rotate(
+		    m_rText.begin() + std::ptrdiff_t(m_AttributesEnd), m_rText.begin() + std::ptrdiff_t(end), m_rText.end());
+	m_AttributesEnd += m_rText.size() - end;
+	return true;
 }
 
 bool VWriterNode::WriteElement(std::string_view i_Name, const std::function<void(VWriterNode&)>& i_rCallback,
@@ -40,8 +68,12 @@ bool VWriterNode::WriteElement(std::string_view i_Name, const std::function<void
 		    "%1% element is nested deeper than %2% levels and could not be read back.", i_Name, c_MaximumDepth);
 		return false;
 	}
-	VWriterNode child(m_rDocument, m_rDocument.AppendElement(m_pElement, i_Name), i_Name, m_Depth + 1, m_pGlobal);
+	if (!std::exchange(m_bHasChildren, true))
+		m_rText += ">\n";
+	VWriterNode child(m_rText, i_Name, m_Depth + 1, m_pGlobal);
+	child.Open();
 	i_rCallback(child);
+	child.Close();
 	return true;
 }
 

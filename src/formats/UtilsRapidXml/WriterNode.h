@@ -1,6 +1,5 @@
 #pragma once
 
-#include "UtilsRapidXml/Document.h"
 #include "UtilsRapidXml/Messages.h"
 #include "UtilsRapidXml/Version.h"
 
@@ -12,8 +11,8 @@
 namespace UtilsRapidXml
 {
 
-/// Builds a document from the top. What the version being written does not have is left out. The document must outlive
-/// the nodes.
+/// Writes a document from the top. What the version being written does not have is left out. Nodes live for the length
+/// of one callback, in which they and no other write.
 class VWriterNode
 {
 public:
@@ -24,8 +23,8 @@ public:
 		VMessages m_Errors;
 	};
 
-	/// The node above the document's elements; writes the declaration.
-	explicit VWriterNode(VDocument& i_rDocument);
+	/// The node above the document's elements. It begins the text anew, with the declaration; the text must outlive it.
+	explicit VWriterNode(std::string& o_rText);
 
 	const std::shared_ptr<VGlobalInfo>& GetGlobalInfo() const { return m_pGlobal; }
 	const std::string& GetName() const { return m_Name; }
@@ -34,7 +33,8 @@ public:
 	void AddError(const std::string& i_rText) { m_pGlobal->m_Errors.Add(i_rText); }
 
 	/// @return false, with nothing written, if the version is set and out of range, or (with an error added) if the
-	/// text has bytes that XML cannot hold.
+	/// text has bytes that XML cannot hold. Attributes stand in the order of the calls, behind children too, which
+	/// costs a move of these.
 	bool WriteAttribute(
 	    std::string_view i_Name, std::string_view i_Text, VVersion i_Minimum = {}, VVersion i_Maximum = {});
 
@@ -45,14 +45,19 @@ public:
 	    VVersion i_Minimum = {}, VVersion i_Maximum = {});
 
 private:
-	VWriterNode(VDocument& i_rDocument, VXmlNode* i_pElement, std::string_view i_Name, std::size_t i_Depth,
-	    std::shared_ptr<VGlobalInfo> i_pGlobal);
+	VWriterNode(
+	    std::string& io_rText, std::string_view i_Name, std::size_t i_Depth, std::shared_ptr<VGlobalInfo> i_pGlobal);
 
-	VDocument& m_rDocument;
-	VXmlNode* m_pElement;
+	void Open();
+	void Close();
+
+	std::string& m_rText;
 	std::string m_Name;
 	std::size_t m_Depth;
 	std::shared_ptr<VGlobalInfo> m_pGlobal;
+	/// Behind the last attribute. What follows are children, if there are any.
+	std::size_t m_AttributesEnd = 0;
+	bool m_bHasChildren = false;
 };
 
 } // namespace UtilsRapidXml
