@@ -42,6 +42,19 @@ function(check_headers)
 	endforeach()
 endfunction()
 
+# What is installed is placed anywhere, its tables are bound and read-only before it begins, its stack and copies guarded.
+function(check_hardened)
+	file(GLOB_RECURSE module ${prefix}/*/TesselPluginRetargetSetup.so)
+	foreach(program IN ITEMS ${prefix}/bin/retarget ${prefix}/bin/retarget-studio ${module})
+		execute_process(COMMAND readelf -hdlW --dyn-syms ${program} OUTPUT_VARIABLE elf COMMAND_ERROR_IS_FATAL ANY)
+		foreach(sign IN ITEMS "Type: +DYN" " NOW" GNU_RELRO __stack_chk_fail "__[a-z]+_chk@")
+			if(NOT elf MATCHES "${sign}")
+				message(FATAL_ERROR "${program} is not hardened: it has no \"${sign}\"")
+			endif()
+		endforeach()
+	endforeach()
+endfunction()
+
 foreach(command IN ITEMS
 	"${CMAKE_COMMAND};--install;${build};--prefix;${prefix}"
 	"${CMAKE_COMMAND};-G;Ninja;-S;${consumer};-B;${prefix}/consumer;-DCMAKE_PREFIX_PATH=${prefix};-DCMAKE_CXX_COMPILER=${compiler}"
@@ -58,3 +71,6 @@ foreach(command IN ITEMS
 endforeach()
 check_headers()
 check_kinds()
+if(hardened)
+	check_hardened()
+endif()
