@@ -81,10 +81,15 @@ function(retarget_library name)
 	retarget_install(${name} ${CMAKE_CURRENT_SOURCE_DIR} ${arg_INTERNAL})
 endfunction()
 
-# retarget_qml(NAME FILE.qrc): the QML files of a resource file, compiled: a first start need not do it.
+# retarget_qml(NAME FILE.qrc): the QML files of a resource file, compiled: a first start need not do it. Under the
+# sanitizers, which look at nothing in them, they are as they are.
 function(retarget_qml name file)
-	find_package(Qt5QuickCompiler REQUIRED)
-	qtquick_compiler_add_resources(sources ${file})
+	if(RETARGET_SANITIZE)
+		qt5_add_resources(sources ${file})
+	else()
+		find_package(Qt5QuickCompiler REQUIRED)
+		qtquick_compiler_add_resources(sources ${file})
+	endif()
 	set_source_files_properties(${sources} PROPERTIES SKIP_AUTOMOC ON)
 	target_sources(${name} PRIVATE ${sources})
 endfunction()
