@@ -1,3 +1,4 @@
+#include "numerics/FastRotation.h"
 #include "numerics/Rotation.h"
 
 #include <Eigen/Geometry>
@@ -62,6 +63,7 @@ TEST(Rotation, AngleAxisToMatrixAndBack)
 		SCOPED_TRACE(rRow.m_pName);
 		const VMatrix3 matrix = RotationMatrixFromAngleAxis(rRow.m_AngleAxis);
 		EXPECT_LT(Difference(matrix, Expected(rRow.m_AngleAxis)), 1e-15);
+		EXPECT_LT(Difference(FastRotationMatrix(rRow.m_AngleAxis), Expected(rRow.m_AngleAxis)), 1e-15);
 		EXPECT_TRUE(IsRotationMatrix(matrix, 1e-14));
 		const VVector3 back = CanonicalAngleAxis(AngleAxisFromRotationMatrix(matrix));
 		for (int i = 0; i < 3; ++i)
@@ -73,6 +75,7 @@ TEST(Rotation, BelowTheSmallestAngleIsExactlyTheIdentity)
 {
 	EXPECT_EQ(RotationMatrixFromAngleAxis({0, 0, 0}), c_Identity3);
 	EXPECT_EQ(RotationMatrixFromAngleAxis({1e-15, -1e-15, 1e-15}), c_Identity3);
+	EXPECT_EQ(FastRotationMatrix(VVector3{1e-15, -1e-15, 1e-15}), c_Identity3);
 	EXPECT_EQ(AngleAxisFromRotationMatrix(c_Identity3), (VVector3{}));
 }
 

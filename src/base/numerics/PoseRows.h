@@ -1,5 +1,6 @@
 #pragma once
 
+#include "numerics/Lanes.h"
 #include "numerics/Rotation.h"
 
 #include <cstring>

@@ -69,7 +69,9 @@ VXmlNode* VDocument::GetRoot()
 
 void VDocument::AppendDeclaration()
 {
-	m_pContent->Append(GetRoot(), rapidxml::node_declaration, {});
+	VXmlNode* const pDeclaration = m_pContent->Append(GetRoot(), rapidxml::node_declaration, {});
+	for (const auto& [name, value] : c_Declaration)
+		AppendAttribute(pDeclaration, name, value);
 }
 
 void VDocument::AppendProcessingInstruction(std::string_view i_Target, std::string_view i_Text)

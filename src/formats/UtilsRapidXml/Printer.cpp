@@ -85,7 +85,9 @@ bool Open(const VXmlNode& i_rNode, std::size_t i_Depth, std::string& io_rText)
 	io_rText.append(i_Depth, '\t');
 	if (i_rNode.type() == rapidxml::node_declaration)
 	{
-		io_rText += UtilsRapidXml::c_Declaration;
+		io_rText += "<?xml";
+		AppendAttributes(i_rNode, io_rText);
+		io_rText += "?>\n";
 		return false;
 	}
 	if (i_rNode.type() == rapidxml::node_pi)

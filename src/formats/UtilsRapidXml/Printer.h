@@ -4,6 +4,7 @@
 
 #include <string>
 #include <string_view>
+#include <utility>
 
 namespace UtilsRapidXml
 {
@@ -13,8 +14,9 @@ namespace UtilsRapidXml
 /// byte by byte, and it does not recurse.
 std::string Print(const VXmlNode& i_rDocument);
 
-/// The declaration of version 1.0, UTF-8, not standalone, with which every text of ours begins.
-inline constexpr std::string_view c_Declaration = "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\"?>\n";
+/// With this declaration every text of ours begins: version 1.0, UTF-8, not standalone.
+inline constexpr std::pair<std::string_view, std::string_view> c_Declaration[] = {
+    {"version", "1.0"}, {"encoding", "UTF-8"}, {"standalone", "no"}};
 
 /// An attribute of an element that is open, as Print writes it.
 void PrintAttribute(std::string_view i_Name, std::string_view i_Value, std::string& io_rText);

@@ -12,7 +12,10 @@ namespace UtilsRapidXml
 
 VWriterNode::VWriterNode(std::string& o_rText) : VWriterNode(o_rText, {}, 0, std::make_shared<VGlobalInfo>())
 {
-	o_rText = c_Declaration;
+	o_rText = "<?xml";
+	for (const auto& [name, value] : c_Declaration)
+		PrintAttribute(name, value, o_rText);
+	o_rText += "?>\n";
 	// It has no tag of its own that would have to be ended.
 	m_bHasChildren = true;
 }

@@ -2,6 +2,7 @@
 
 #include "ComputeSubjectFK/JointFKInterfaces.h"
 #include "CoreOrlexTypes/Subject.h"
+#include "numerics/FastRotation.h"
 
 #include <array>
 
@@ -116,14 +117,14 @@ public:
 template <typename T>
 void VJointFKFree::Motion(const T* i_pState, Rotation::VPose<T>& o_rPose)
 {
-	o_rPose.R = Rotation::RotationMatrixFromAngleAxis(std::array<T, 3>{i_pState[0], i_pState[1], i_pState[2]});
+	o_rPose.R = Rotation::FastRotationMatrix(std::array<T, 3>{i_pState[0], i_pState[1], i_pState[2]});
 	o_rPose.t = {i_pState[3], i_pState[4], i_pState[5]};
 }
 
 template <typename T>
 void VJointFKBall::Motion(const T* i_pState, Rotation::VPose<T>& o_rPose)
 {
-	o_rPose.R = Rotation::RotationMatrixFromAngleAxis(std::array<T, 3>{i_pState[0], i_pState[1], i_pState[2]});
+	o_rPose.R = Rotation::FastRotationMatrix(std::array<T, 3>{i_pState[0], i_pState[1], i_pState[2]});
 	o_rPose.t = {};
 }
 
