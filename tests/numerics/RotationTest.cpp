@@ -1,5 +1,5 @@
-#include "numerics/FastRotation.h"
 #include "numerics/Rotation.h"
+#include "numerics/FastRotation.h"
 
 #include <Eigen/Geometry>
 #include <gtest/gtest.h>
