@@ -75,8 +75,10 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	app.add_option("--frame", frame, "Show this frame of the take first; its first is 0")
 	    ->option_text("NUMBER")
 	    ->needs(pTake);
-	app.add_option("--open", dialog, "Open a dialog, too: the proposed targets, the alignment, or the preferences")
-	    ->option_text("align|preferences|propose")
+	app.add_option("--open", dialog,
+	       "Open a dialog, too: the proposed targets, the alignment, "
+	       "what is not saved yet, or the preferences")
+	    ->option_text("align|compare|preferences|propose")
 	    ->check(CLI::IsMember(VStudioWindow::Dialogs()));
 	app.add_option("--screenshot", screenshot, "Save a picture of the window when it is ready, and end")
 	    ->option_text("OUT.png");

@@ -58,7 +58,7 @@ VJson ToJson(const SetupReview::VRangeOfMotion& i_rRange, const VSubjectParametr
 	    {"conflicts", conflicts}, {"unopposed", i_rRange.m_Unopposed}};
 }
 
-std::string PruneText(const VAdvice& i_rAdvice, const VSubjectParametrised& i_rSubject)
+std::string PruneText(const SetupReview::VAdvice& i_rAdvice, const VSubjectParametrised& i_rSubject)
 {
 	if (i_rAdvice.m_Prune.empty())
 		return "Every joint carries a target\n";
@@ -69,13 +69,13 @@ std::string PruneText(const VAdvice& i_rAdvice, const VSubjectParametrised& i_rS
 	table.AddColumn("WHY", VTable::ELeft);
 	for (const VPruneAdvice& rAdvice : i_rAdvice.m_Prune)
 		table.AddRow({i_rSubject.m_Segments[rAdvice.m_Segment].m_Name, SetupReview::NameOf(rAdvice.m_Verdict),
-		    PoseChangeText(rAdvice, i_rSubject), rAdvice.m_Words});
+		    SetupReview::PoseChangeText(rAdvice, i_rSubject), rAdvice.m_Words});
 	return "Joints without a target of their own\n" + table.Text(HasColours(STDOUT_FILENO), TerminalWidth());
 }
 
 std::string RangeText(const SetupReview::VRangeOfMotion& i_rRange)
 {
-	std::string text = "\n" + RangeSummary(i_rRange) + "\n";
+	std::string text = "\n" + SetupReview::RangeSummary(i_rRange) + "\n";
 	for (std::size_t i = 0; i < i_rRange.m_Conflicts.size(); ++i)
 	{
 		const VRangeConflict& rConflict = i_rRange.m_Conflicts[i];
@@ -93,7 +93,7 @@ EExitStatus Advise(const VAdviseSettings& i_rSettings)
 	session.LoadTarget(i_rSettings.m_In);
 	if (!i_rSettings.m_Source.empty())
 		session.LoadSource(i_rSettings.m_Source);
-	const VAdvice advice = AdviceOn(session, i_rSettings.m_Fbx);
+	const SetupReview::VAdvice advice = AdviceOn(session, i_rSettings.m_Fbx);
 	VJson json{{"skin", advice.m_bSkin}, {"prune", ToJson(advice.m_Prune, session.Target())}};
 	std::string text = PruneText(advice, session.Target());
 	if (advice.m_Range)

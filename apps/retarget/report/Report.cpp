@@ -229,11 +229,12 @@ void AddUnmapped(VSession& io_rSession, VPage& io_rPage)
 
 void AddAdvice(VSession& io_rSession, const VReportSettings& i_rSettings, VPage& io_rPage)
 {
-	const VAdvice advice = AdviceOn(io_rSession, i_rSettings.m_Fbx);
+	const SetupReview::VAdvice advice = AdviceOn(io_rSession, i_rSettings.m_Fbx);
 	VRows rows;
 	for (const SetupReview::VPruneAdvice& rAdvice : advice.m_Prune)
-		rows.push_back({io_rSession.Target().m_Segments[rAdvice.m_Segment].m_Name,
-		    SetupReview::NameOf(rAdvice.m_Verdict), PoseChangeText(rAdvice, io_rSession.Target()), rAdvice.m_Words});
+		rows.push_back(
+		    {io_rSession.Target().m_Segments[rAdvice.m_Segment].m_Name, SetupReview::NameOf(rAdvice.m_Verdict),
+		        SetupReview::PoseChangeText(rAdvice, io_rSession.Target()), rAdvice.m_Words});
 	io_rPage.Heading("Joints without a target of their own");
 	if (rows.empty())
 		io_rPage.Paragraph("There is none.");
@@ -242,7 +243,7 @@ void AddAdvice(VSession& io_rSession, const VReportSettings& i_rSettings, VPage&
 	io_rPage.Heading("Range of motion");
 	if (!advice.m_Range)
 		return io_rPage.Paragraph("The performer's skeleton was not given.");
-	io_rPage.Paragraph(RangeSummary(*advice.m_Range) + ".");
+	io_rPage.Paragraph(SetupReview::RangeSummary(*advice.m_Range) + ".");
 	VRows conflicts;
 	for (const SetupReview::VRangeConflict& rConflict : advice.m_Range->m_Conflicts)
 		conflicts.push_back({rConflict.m_AgainstName, rConflict.m_TargetName, rConflict.m_Words});

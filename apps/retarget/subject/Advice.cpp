@@ -2,66 +2,16 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "retarget/text/InputFile.h"
-#include "retarget/text/Table.h"
-
-#include "FBXIO/FBXReader.h"
-
-#include <numbers>
-#include <set>
 
 namespace CommandLine
 {
 
-VAdvice AdviceOn(VSession& io_rSession, const std::string& i_rFbx)
+SetupReview::VAdvice AdviceOn(VSession& io_rSession, const std::string& i_rFbx)
 {
-	VAdvice advice;
-	std::vector<std::size_t> vertices;
-	if (!i_rFbx.empty())
-	{
-		FBXIO::FBXReader reader;
-		reader.SetMeshRules(FBXIO::c_FaithfulMeshes);
-		if (!reader.LoadFile(InputPath(i_rFbx).string()) || !reader.IsComplete())
-			throw VCommandError(EBadInput, "\"" + i_rFbx + "\" could not be read whole as FBX");
-		FBXIO::VSkin skin;
-		reader.ReadSkin(skin);
-		vertices = SetupReview::SkinVertices(io_rSession.Target(), skin);
-		advice.m_bSkin = !skin.m_Meshes.empty();
-	}
-	advice.m_Prune = SetupReview::AdvisePruning(io_rSession.Target(), vertices);
-	const auto source = io_rSession.Document().SourceValues();
-	if (source.m_pParametrised)
-		advice.m_Range = SetupReview::GoThroughRange(source, io_rSession.Document().TargetValues());
-	return advice;
-}
-
-std::string PoseChangeText(
-    const SetupReview::VPruneAdvice& i_rAdvice, const CoreOrlexTypes::VSubjectParametrised& i_rSubject)
-{
-	if (!i_rAdvice.m_PoseChange)
-		return i_rAdvice.m_bPoseKnown ? "as it is" : "not computed";
-	return i_rSubject.m_Segments[i_rAdvice.m_PoseChange->m_SegmentIndex].m_Name + " by "
-	    + Fixed(i_rAdvice.m_PoseChange->m_Distance, 1) + " mm and "
-	    + Fixed(i_rAdvice.m_PoseChange->m_Angle * 180.0 / std::numbers::pi, 1) + " degrees";
-}
-
-std::string RangeSummary(const SetupReview::VRangeOfMotion& i_rRange)
-{
-	if (!i_rRange.m_Refusal.empty())
-		return "No range of motion: " + i_rRange.m_Refusal;
-	std::set<std::size_t> against;
-	for (const SetupReview::VRangeConflict& rConflict : i_rRange.m_Conflicts)
-		against.insert(rConflict.m_Against);
-	const std::size_t pullers = against.size();
-	return "Range of motion: " + std::to_string(i_rRange.m_Poses) + " poses, in "
-	    + (i_rRange.m_NotConverged == 0
-	            ? "all of which the solve came to its end"
-	            : std::to_string(i_rRange.m_NotConverged) + " of which the solve found only the best it could")
-	    + "; " + std::to_string(pullers) + (pullers == 1 ? " target pulls" : " targets pull") + " against "
-	    + std::to_string(i_rRange.m_Conflicts.size()) + " others: a lower weight, or lengths that are more alike, helps"
-	    + (i_rRange.m_Unopposed == 0 ? ""
-	                                 : "; " + std::to_string(i_rRange.m_Unopposed)
-	                + " more are missed by 10 mm or 5 degrees more than at rest, with no single one against them")
-	    + (i_rRange.m_bCutShort ? "; there is more than was looked at" : "");
+	auto advice = SetupReview::AdviceOn(io_rSession.Document(), i_rFbx.empty() ? "" : InputPath(i_rFbx));
+	if (!advice)
+		throw VCommandError(EBadInput, "\"" + i_rFbx + "\" could not be read whole as FBX");
+	return *std::move(advice);
 }
 
 } // namespace CommandLine

@@ -40,7 +40,7 @@ constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubje
     {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"MatchFilePose", "Take pose from FBX"},
     {"UpdateTargets", "Update targets"}, {"ProposeTargets", "Propose Targets"}, {"AddTargets", "Propose Targets"},
     {"AlignToSource", "Align to Source"}, {"CopyCommands", "Copy as Commands"}, {"SaveRecipe", "Save as Recipe"},
-    {"FitPreset", "Preset"}, {"Rebind", "Re-bind"}, {"SavePreset", "Save as Preset"},
+    {"FitPreset", "Preset"}, {"Rebind", "Re-bind"}, {"SavePreset", "Save as Preset"}, {"CompareWith", "Compare"},
     {"RestoreTargetSubjectURL", "Restore"}};
 
 /// By objectName, of what can be seen.
@@ -407,6 +407,15 @@ void VRetargetPanel::Rebind(bool i_bPerformer, bool i_bMeasure)
 	QMetaObject::invokeMethod(m_pDocument, "Rebind", Q_ARG(bool, i_bPerformer), Q_ARG(bool, i_bMeasure));
 }
 
+QVariantMap VRetargetPanel::CompareWith(const QString& i_rPath)
+{
+	ApplyTyped();
+	QVariantMap review;
+	QMetaObject::invokeMethod(m_pDocument, "CompareWith", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, review),
+	    Q_ARG(QUrl, QUrl::fromLocalFile(i_rPath)));
+	return review;
+}
+
 QStringList VRetargetPanel::SegmentsOf(const char* i_pModel) const
 {
 	const QAbstractItemModel* const pModel = Model(i_pModel);
@@ -524,8 +533,9 @@ std::vector<NVX::ISelectionItem> VRetargetPanel::ItemsNamedIn(const QString& i_r
 	const auto isSegment = [&](int, const QString& i_rName) { return names.contains(i_rName); };
 	take("SourceSegmentModel", isSegment);
 	take("TargetSegmentModel", isSegment);
-	if (target.hasMatch())
-		take("TargetModel", [&](int i_Row, const QString&) { return i_Row == target.captured(1).toInt(); });
+	take("TargetModel",
+	    [&](int i_Row, const QString& i_rName)
+	    { return (target.hasMatch() && i_Row == target.captured(1).toInt()) || names.contains(i_rName); });
 	return items;
 }
 

@@ -100,6 +100,8 @@ public:
 	void EndAlignment(bool i_bKeep);
 	QVariantMap LookAtRebind(bool i_bPerformer) const;
 	void Rebind(bool i_bPerformer, bool i_bMeasure);
+	/// The document's function of this name.
+	QVariantMap CompareWith(const QString& i_rPath);
 	/// By name.
 	QStringList SourceSegments() const { return SegmentsOf("SourceSegmentModel"); }
 	QStringList TargetSegments() const { return SegmentsOf("TargetSegmentModel"); }

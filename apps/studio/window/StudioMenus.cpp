@@ -80,9 +80,9 @@ constexpr VCommandRow c_CommandRows[] = {
 
 } // namespace
 
-const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 3> VStudioWindow::c_Dialogs = {
-    {{"align", &VStudioWindow::ShowAlignment}, {"preferences", &VStudioWindow::ShowPreferences},
-        {"propose", &VStudioWindow::ShowProposal}}};
+const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 4> VStudioWindow::c_Dialogs = {
+    {{"align", &VStudioWindow::ShowAlignment}, {"compare", &VStudioWindow::CompareWithSaved},
+        {"preferences", &VStudioWindow::ShowPreferences}, {"propose", &VStudioWindow::ShowProposal}}};
 
 QAction* VStudioWindow::AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText,
     const QKeySequence& i_rShortcut, std::function<void()> i_Run)
@@ -247,6 +247,9 @@ void VStudioWindow::MakeToolsMenu()
 	AddAction(rMenu, "AlignToSourceAction", tr("&Align to Source..."), {}, [this] { ShowAlignment(); });
 	AddAction(rMenu, "RebindToFbx", tr("Re-bind to the &FBX..."), {}, [this] { ShowRebind(false, true); });
 	AddAction(rMenu, "RebindToPerformer", tr("Re-bind to the Pe&rformer..."), {}, [this] { ShowRebind(true, true); });
+	rMenu.addSeparator();
+	AddAction(rMenu, "CompareWith", tr("&Compare with..."), {}, [this] { AskAndCompare(); });
+	AddAction(rMenu, "CompareWithSaved", tr("Compare with Its File as Sa&ved"), {}, [this] { CompareWithSaved(); });
 	rMenu.addSeparator();
 	AddAction(rMenu, "SavePreset", tr("&Save Targets as Preset..."), {}, [this] { SavePreset(); });
 }

@@ -23,6 +23,7 @@ class VPluginGui;
 class VQtDispatcher;
 class VRecentFiles;
 class VRetargetPanel;
+struct VReview;
 class VTakePlayer;
 class VWorkKeeper;
 
@@ -80,7 +81,7 @@ protected:
 
 private:
 	/// Names of dialogs and what shows them.
-	static const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 3> c_Dialogs;
+	static const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 4> c_Dialogs;
 
 	void MakeMenus(bool i_bDeveloper);
 	void MakeFileMenu();
@@ -109,6 +110,12 @@ private:
 	void ShowAlignment();
 	/// @param i_bAsked the operator wants to know, even that there is nothing to do.
 	void ShowRebind(bool i_bPerformer, bool i_bAsked);
+	/// In place of one of its name.
+	void ShowReview(const VReview& i_rReview);
+	void AskAndCompare();
+	/// With the file that the target subject is of; asks for one if there is none.
+	void CompareWithSaved();
+	void CompareWith(const QString& i_rPath);
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
 	void ShowOperatorPage();

@@ -92,6 +92,13 @@ public:
 	/// @param i_bMeasure measures the offsets of all targets anew, too.
 	Q_INVOKABLE void Rebind(bool i_bPerformer, bool i_bMeasure);
 
+	// What can be told of the target subject, as a map of "summary", a sentence, and "rows", a list of maps: "cells",
+	// texts in the order that stands with each, and "about", a text that names segments and targets as messages do.
+	// Empty if there is nothing to tell, for the reason that commandIgnored tells.
+
+	/// In what it differs from a file, which is the earlier one. Cells: a sentence.
+	Q_INVOKABLE QVariantMap CompareWith(const QUrl& i_rFileURL);
+
 	// For a host that offers Undo and Redo.
 
 	Q_INVOKABLE void Undo() { VRetargetSetupCore::Undo(); }

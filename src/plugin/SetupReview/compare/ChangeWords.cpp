@@ -4,11 +4,11 @@
 #include "CoreOrlexTypes/JointType.h"
 #include "RetargetSetupCore/BindPose.h"
 #include "RetargetSetupCore/GlobalScale.h"
+#include "SetupReview/compare/ValueText.h"
 #include "math/NumberText.h"
 #include "numerics/Rotation.h"
 
 #include <algorithm>
-#include <charconv>
 #include <cmath>
 #include <numbers>
 #include <span>
@@ -36,13 +36,6 @@ struct VCase
 	const VJoint& JointBefore() const { return Before().m_Segments[m_Before].m_Joint; }
 	const VJoint& JointAfter() const { return After().m_Segments[m_After].m_Joint; }
 };
-
-std::string FixedText(double i_Value, int i_Decimals)
-{
-	char text[64];
-	const auto end = std::to_chars(text, text + sizeof(text), i_Value, std::chars_format::fixed, i_Decimals);
-	return end.ec == std::errc() ? std::string(text, end.ptr) : NumberText::PrintShortest(i_Value);
-}
 
 std::string Millimetres(double i_Value)
 {

@@ -3,6 +3,7 @@
 #include "CoreOrlexTypes/Fields.h"
 #include "math/NumberText.h"
 
+#include <charconv>
 #include <cmath>
 #include <string>
 #include <type_traits>
@@ -10,6 +11,13 @@
 
 namespace SetupReview
 {
+
+inline std::string FixedText(double i_Value, int i_Decimals)
+{
+	char text[64];
+	const auto end = std::to_chars(text, text + sizeof(text), i_Value, std::chars_format::fixed, i_Decimals);
+	return end.ec == std::errc() ? std::string(text, end.ptr) : NumberText::PrintShortest(i_Value);
+}
 
 template <typename T>
 inline constexpr bool c_bList = false;

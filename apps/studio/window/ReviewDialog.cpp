@@ -1,0 +1,135 @@
+#include "studio/window/ReviewDialog.h"
+
+#include "TesselPluginInterface/ISelectionManager.h"
+#include "studio/panel/RetargetPanel.h"
+#include "studio/window/BesideView.h"
+#include "studio/window/Named.h"
+#include "studio/window/PlainTexts.h"
+
+#include <QApplication>
+#include <QClipboard>
+#include <QDialogButtonBox>
+#include <QHeaderView>
+#include <QLabel>
+#include <QPushButton>
+#include <QTreeWidget>
+#include <QVBoxLayout>
+
+#include <algorithm>
+
+namespace StudioHost
+{
+namespace
+{
+
+/// No column but the last is wider, in pixels.
+constexpr int c_WidestColumn = 240;
+
+QVariantMap RowOf(const QTreeWidgetItem* i_pItem)
+{
+	return i_pItem ? i_pItem->data(0, Qt::UserRole).toMap() : QVariantMap();
+}
+
+} // namespace
+
+VReviewDialog::VReviewDialog(const VReview& i_rReview, VRetargetPanel& i_rPanel,
+    TesselPluginInterface::ISelection& io_rSelection, QWidget* i_pParent)
+    : QDialog(i_pParent), m_Review(i_rReview), m_rPanel(i_rPanel), m_rSelection(io_rSelection),
+      m_pSummary(Named(new QLabel, "ReviewSummary", tr("In a sentence"))),
+      m_pRows(Named(new QTreeWidget, "ReviewRows", i_rReview.m_Title))
+{
+	Named(this, i_rReview.m_pName, i_rReview.m_Title);
+	setWindowTitle(i_rReview.m_Title);
+	setAttribute(Qt::WA_DeleteOnClose);
+	m_pSummary->setWordWrap(true);
+	m_pRows->setHeaderLabels(i_rReview.m_Columns);
+	m_pRows->setHeaderHidden(i_rReview.m_Columns.size() == 1);
+	m_pRows->setRootIsDecorated(false);
+	m_pRows->setAllColumnsShowFocus(true);
+	m_pRows->setWordWrap(true);
+	m_pRows->header()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+	connect(m_pRows, &QTreeWidget::currentItemChanged, this, &VReviewDialog::ChooseRow);
+
+	auto* const pButtons = Named(new QDialogButtonBox(QDialogButtonBox::Close), "ReviewButtons", tr("What to do"));
+	const auto add = [&](const char* i_pName, const QString& i_rText, void (VReviewDialog::*i_pPressed)())
+	{
+		auto* const pButton =
+		    Named(pButtons->addButton(i_rText, QDialogButtonBox::ActionRole), i_pName, QString(i_rText).remove('&'));
+		pButton->setAutoDefault(false);
+		connect(pButton, &QPushButton::clicked, this, i_pPressed);
+		return pButton;
+	};
+	if (!i_rReview.m_Action.isEmpty())
+		m_pAction = add("ReviewAct", i_rReview.m_Action, &VReviewDialog::Act);
+	add("ReviewCopy", tr("C&opy"), &VReviewDialog::Copy)->setShortcut(QKeySequence::Copy);
+	add("ReviewAgain", tr("&Look Again"), &VReviewDialog::LookAgain);
+	Named(pButtons->button(QDialogButtonBox::Close), "ReviewClose", tr("Close"));
+	connect(pButtons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+	connect(&m_rPanel, &VRetargetPanel::stateChanged, this,
+	    [this] { m_pSummary->setText(tr("The target subject was edited or saved since: look again.")); });
+	auto* const pLayout = new QVBoxLayout(this);
+	pLayout->addWidget(m_pSummary);
+	pLayout->addWidget(m_pRows, 1);
+	pLayout->addWidget(pButtons);
+	resize(620, 480);
+	StandBesideView(*this);
+}
+
+bool VReviewDialog::Look()
+{
+	QApplication::setOverrideCursor(Qt::WaitCursor);
+	const QVariantMap review = m_Review.m_Look();
+	QApplication::restoreOverrideCursor();
+	if (review.isEmpty())
+		return false;
+	m_pSummary->setText(review["summary"].toString());
+	m_pRows->clear();
+	for (const QVariant& rRow : review["rows"].toList())
+	{
+		const QStringList cells = rRow.toMap()["cells"].toStringList();
+		auto* const pItem = new QTreeWidgetItem(m_pRows, cells);
+		pItem->setData(0, Qt::UserRole, rRow);
+		for (int column = 0; column < cells.size(); ++column)
+		{
+			pItem->setToolTip(column, PlainToolTip(cells[column]));
+			pItem->setTextAlignment(column, Qt::AlignLeft | Qt::AlignTop);
+		}
+	}
+	for (int column = 0; column + 1 < m_pRows->columnCount(); ++column)
+	{
+		m_pRows->resizeColumnToContents(column);
+		m_pRows->setColumnWidth(column, std::min(m_pRows->columnWidth(column), c_WidestColumn));
+	}
+	ChooseRow();
+	return true;
+}
+
+void VReviewDialog::LookAgain()
+{
+	if (!Look())
+		m_pSummary->setText(tr("There is nothing to look at any more: the log tells why."));
+}
+
+void VReviewDialog::ChooseRow()
+{
+	const QVariantMap row = RowOf(m_pRows->currentItem());
+	if (m_pAction)
+		m_pAction->setEnabled(m_Review.m_CanAct(row));
+	if (const auto items = m_rPanel.ItemsNamedIn(row["about"].toString()); !items.empty())
+		m_rSelection.Replace(items);
+}
+
+void VReviewDialog::Copy()
+{
+	QString text;
+	for (int row = 0; row < m_pRows->topLevelItemCount(); ++row)
+		text += RowOf(m_pRows->topLevelItem(row))["cells"].toStringList().join('\t') + '\n';
+	QApplication::clipboard()->setText(text.isEmpty() ? m_pSummary->text() : text);
+}
+
+void VReviewDialog::Act()
+{
+	m_Review.m_Act(RowOf(m_pRows->currentItem()));
+}
+
+} // namespace StudioHost

@@ -1,0 +1,51 @@
+// What the window tells of the target subject as it stands, beside the dialogs that change it.
+
+#include "TesselPluginInterface/PathTypes.h"
+#include "studio/host/Services.h"
+#include "studio/panel/FileKind.h"
+#include "studio/panel/RetargetPanel.h"
+#include "studio/window/ReviewDialog.h"
+#include "studio/window/StudioWindow.h"
+
+#include <QFileDialog>
+#include <QFileInfo>
+
+#include <memory>
+
+namespace StudioHost
+{
+
+void VStudioWindow::ShowReview(const VReview& i_rReview)
+{
+	delete findChild<QDialog*>(QLatin1String(i_rReview.m_pName));
+	auto pDialog = std::make_unique<VReviewDialog>(
+	    i_rReview, *m_pRetargetPanel, m_pContext->GetSelectionManager()->Selection(), this);
+	// Why there is nothing to show is told.
+	if (pDialog->Look())
+		pDialog.release()->show();
+}
+
+void VStudioWindow::AskAndCompare()
+{
+	if (!m_pRetargetPanel)
+		return;
+	const QString file = QFileDialog::getOpenFileName(this, tr("Choose the file to compare with"),
+	    FolderOf(TesselPluginInterface::c_FolderKeys[TesselPluginInterface::EPathRetargets]),
+	    DialogFilter(EFileKind::ETarget));
+	if (!file.isEmpty())
+		CompareWith(file);
+}
+
+void VStudioWindow::CompareWithSaved()
+{
+	const QString file = m_pRetargetPanel ? m_pRetargetPanel->CurrentFile() : QString();
+	file.isEmpty() ? AskAndCompare() : CompareWith(file);
+}
+
+void VStudioWindow::CompareWith(const QString& i_rPath)
+{
+	ShowReview({"Compare", tr("Compare with %1").arg(QFileInfo(i_rPath).fileName()), {tr("What differs")},
+	    [this, i_rPath] { return m_pRetargetPanel->CompareWith(i_rPath); }});
+}
+
+} // namespace StudioHost

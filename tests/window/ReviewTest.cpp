@@ -1,0 +1,111 @@
+// What the studio tells of the target subject as it stands, by mouse, against what the command line tells of its file.
+
+#include "WindowFixture.h"
+
+#include "TesselPluginInterface/ISelectionManager.h"
+#include "studio/host/Services.h"
+
+#include <QApplication>
+#include <QClipboard>
+#include <QFile>
+#include <QLabel>
+#include <QProcess>
+#include <QTest>
+#include <QTreeWidget>
+#include <QWindow>
+
+namespace
+{
+
+class Review : public Window
+{
+protected:
+	void SetUp() override
+	{
+		Window::SetUp();
+		ASSERT_FALSE(HasFatalFailure());
+		m_pOperator->Choose("SourceSkeleton", "performer");
+		Run({"create", "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--auto", "-o",
+		    File("hero.qrr")});
+		m_pOperator->Choose("TargetFBX", "character");
+		EXPECT_EVENTUALLY(m_pOperator->Property("TargetRoot", "currentText").toString() == "haunch");
+		ASSERT_TRUE(m_pWindow->Open(File("hero.qrr")));
+		EXPECT_EVENTUALLY(Targets() > 10 && m_pOperator->Property("sourceSegments", "count").toInt() > 20);
+	}
+
+	QWidget* Dialog(const char* i_pName) const { return m_pWindow->findChild<QWidget*>(i_pName); }
+	void Press(const char* i_pDialog, const char* i_pButton) const
+	{
+		QWidget* pDialog = nullptr;
+		EXPECT_EVENTUALLY(
+		    (pDialog = Dialog(i_pDialog)) && pDialog->windowHandle() && pDialog->windowHandle()->isExposed());
+		ASSERT_TRUE(pDialog);
+		const auto* const pButton = pDialog->findChild<QWidget*>(i_pButton);
+		QTest::mouseClick(
+		    pDialog->windowHandle(), Qt::LeftButton, {}, pButton->mapTo(pDialog, pButton->rect().center()));
+	}
+	/// What the studio tells, as text.
+	QString Copied(const char* i_pDialog) const
+	{
+		QApplication::clipboard()->clear();
+		Press(i_pDialog, "ReviewCopy");
+		return QApplication::clipboard()->text();
+	}
+	/// Clicks the first row with this text.
+	/// @return the names of what is selected then, of the character.
+	QStringList Choose(const char* i_pDialog, const QString& i_rText) const
+	{
+		QWidget& rDialog = *Dialog(i_pDialog);
+		auto& rRows = *rDialog.findChild<QTreeWidget*>("ReviewRows");
+		auto* const pRow = rRows.findItems(i_rText, Qt::MatchContains | Qt::MatchWildcard).value(0);
+		if (!pRow)
+			return {"no such row"};
+		rRows.scrollToItem(pRow);
+		QTest::mouseClick(rDialog.windowHandle(), Qt::LeftButton, {},
+		    rRows.viewport()->mapTo(&rDialog, rRows.visualItemRect(pRow).topLeft() + QPoint(20, 8)));
+		QStringList names;
+		for (const auto& rItem : m_pWindow->Context().GetSelectionManager()->Selection().Items())
+			names << Names("targetSegments").value(int(rItem.m_ElementIndex));
+		return names;
+	}
+	void SaveAs(const char* i_pName)
+	{
+		m_pWindow->activateWindow();
+		EXPECT_TRUE(QTest::qWaitForWindowActive(m_pWindow.get()));
+		m_pOperator->Click("saveAs");
+		m_pOperator->AnswerDialog(File(i_pName));
+		EXPECT_EVENTUALLY(QFile::exists(File(i_pName)) && !m_pWindow->isWindowModified());
+	}
+};
+
+TEST_F(Review, TellsWhatDiffersFromAFile)
+{
+	m_pOperator->ChooseInMenu("ToolsMenu", "CompareWithSaved");
+	EXPECT_EQ(Copied("Compare"), "Nothing differs.");
+	Press("Compare", "ReviewClose");
+	EXPECT_EVENTUALLY(!Dialog("Compare"));
+	m_pOperator->Click("removeUnnecessaryJoints");
+	m_pOperator->Click("updateTargets");
+	EXPECT_EVENTUALLY(m_pWindow->isWindowModified());
+	m_pOperator->AnswerNextDialog(File("hero.qrr"));
+	m_pOperator->ChooseInMenu("ToolsMenu", "CompareWith");
+	const QString differs = Copied("Compare");
+	EXPECT_EQ(Choose("Compare", "segment \"crest\"*joint pruned*"), QStringList("crest"));
+	SaveAs("now.qrr");
+	QProcess diff;
+	diff.start(RETARGET_PROGRAM, {"diff", File("hero.qrr"), File("now.qrr")});
+	EXPECT_TRUE(diff.waitForFinished(60000));
+	EXPECT_EQ(differs.toUtf8(), diff.readAllStandardOutput()) << "what is not saved counts, too";
+	EXPECT_TRUE(Dialog("Compare")->findChild<QLabel*>("ReviewSummary")->text().contains("look again"));
+	Press("Compare", "ReviewAgain");
+	EXPECT_EQ(Copied("Compare"), differs);
+	// One that is none leaves the table.
+	QFile(File("performer.qrs")).copy(File("none.qrr"));
+	QFile none(File("none.qrr"));
+	ASSERT_TRUE(none.resize(300));
+	m_pOperator->AnswerNextDialog(File("none.qrr"));
+	m_pOperator->ChooseInMenu("ToolsMenu", "CompareWith");
+	EXPECT_FALSE(Dialog("Compare"));
+}
+
+} // namespace
