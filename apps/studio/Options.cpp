@@ -76,9 +76,9 @@ std::optional<VOptions> ParseOptions(std::vector<std::string> i_Arguments, std::
 	    ->option_text("NUMBER")
 	    ->needs(pTake);
 	app.add_option("--open", dialog,
-	       "Open a dialog, too: the proposed targets, the alignment, "
+	       "Open a dialog, too: the proposed targets, the alignment, advice, the check of the pose, "
 	       "what is not saved yet, or the preferences")
-	    ->option_text("align|compare|preferences|propose")
+	    ->option_text("advice|align|check-pose|compare|preferences|propose")
 	    ->check(CLI::IsMember(VStudioWindow::Dialogs()));
 	app.add_option("--screenshot", screenshot, "Save a picture of the window when it is ready, and end")
 	    ->option_text("OUT.png");

@@ -8,6 +8,8 @@
 #include <QApplication>
 #include <QClipboard>
 #include <QFile>
+#include <QJsonArray>
+#include <QJsonDocument>
 #include <QLabel>
 #include <QProcess>
 #include <QTest>
@@ -106,6 +108,56 @@ TEST_F(Review, TellsWhatDiffersFromAFile)
 	m_pOperator->AnswerNextDialog(File("none.qrr"));
 	m_pOperator->ChooseInMenu("ToolsMenu", "CompareWith");
 	EXPECT_FALSE(Dialog("Compare"));
+}
+
+TEST_F(Review, AdvisesOnJointsAndTargets)
+{
+	m_pOperator->ChooseInMenu("ToolsMenu", "ShowAdvice");
+	const QStringList told = Copied("Advice").split('\n', Qt::SkipEmptyParts);
+	const auto advice = QJsonDocument::fromJson(
+	    Run({"advise", File("hero.qrr"), "--source", File("performer.qrs"), "--fbx", File("character.fbx"), "--json"}));
+	const QJsonArray prune = advice["prune"].toArray();
+	const QJsonArray conflicts = advice["range"]["conflicts"].toArray();
+	ASSERT_EQ(told.size(), prune.size() + conflicts.size());
+	for (int i = 0; i < prune.size(); ++i)
+	{
+		const QStringList cells = told[i].split('\t');
+		EXPECT_EQ(cells.value(0), prune[i]["segment"].toString());
+		EXPECT_EQ(cells.value(1), prune[i]["verdict"].toString());
+		EXPECT_EQ(cells.value(3), prune[i]["words"].toString());
+	}
+	for (int i = 0; i < conflicts.size(); ++i)
+		EXPECT_TRUE(told[prune.size() + i].endsWith(conflicts[i]["words"].toString())) << i;
+	EXPECT_EQ(Choose("Advice", "cape2"), QStringList("cape2"));
+	Choose("Advice", "target 22*");
+	EXPECT_EVENTUALLY(m_pOperator->Property("removeTarget", "enabled").toBool());
+	// The button of the panel takes what could go.
+	m_pOperator->Click("removeUnnecessaryJoints");
+	Press("Advice", "ReviewAgain");
+	EXPECT_FALSE(Copied("Advice").contains("\tgo\t"));
+}
+
+TEST_F(Review, ChecksThePose)
+{
+	m_pOperator->ChooseInMenu("ToolsMenu", "CheckPose");
+	const QStringList told = Copied("PoseCheck").split('\n', Qt::SkipEmptyParts);
+	const QJsonArray findings =
+	    QJsonDocument::fromJson(Run({"map", File("hero.qrr"), "--source", File("performer.qrs"), "--json"}))["pose"]
+	        .toArray();
+	ASSERT_EQ(told.size(), findings.size());
+	for (int i = 0; i < findings.size(); ++i)
+	{
+		const QStringList cells = told[i].split('\t');
+		EXPECT_EQ(cells.value(0), findings[i]["id"].toString());
+		EXPECT_EQ(cells.value(2), findings[i]["message"].toString());
+		EXPECT_TRUE(cells.value(3).endsWith(findings[i]["options"].toString()));
+	}
+	Press("PoseCheck", "ReviewAct");
+	EXPECT_EVENTUALLY(Dialog("AlignToSource"));
+	Press("AlignToSource", "AlignKeep");
+	EXPECT_EVENTUALLY(!Dialog("AlignToSource"));
+	Press("PoseCheck", "ReviewAgain");
+	EXPECT_FALSE(Copied("PoseCheck").contains("\tlook\t"));
 }
 
 } // namespace

@@ -41,7 +41,7 @@ constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubje
     {"UpdateTargets", "Update targets"}, {"ProposeTargets", "Propose Targets"}, {"AddTargets", "Propose Targets"},
     {"AlignToSource", "Align to Source"}, {"CopyCommands", "Copy as Commands"}, {"SaveRecipe", "Save as Recipe"},
     {"FitPreset", "Preset"}, {"Rebind", "Re-bind"}, {"SavePreset", "Save as Preset"}, {"CompareWith", "Compare"},
-    {"RestoreTargetSubjectURL", "Restore"}};
+    {"Advise", "Advice"}, {"CheckPose", "Check Pose"}, {"RestoreTargetSubjectURL", "Restore"}};
 
 /// By objectName, of what can be seen.
 QQuickItem* ItemNamed(QQuickItem& i_rItem, const QString& i_rName)
@@ -413,6 +413,14 @@ QVariantMap VRetargetPanel::CompareWith(const QString& i_rPath)
 	QVariantMap review;
 	QMetaObject::invokeMethod(m_pDocument, "CompareWith", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, review),
 	    Q_ARG(QUrl, QUrl::fromLocalFile(i_rPath)));
+	return review;
+}
+
+QVariantMap VRetargetPanel::Review(const char* i_pQuestion)
+{
+	ApplyTyped();
+	QVariantMap review;
+	QMetaObject::invokeMethod(m_pDocument, i_pQuestion, Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, review));
 	return review;
 }
 

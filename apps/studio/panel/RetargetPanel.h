@@ -100,8 +100,10 @@ public:
 	void EndAlignment(bool i_bKeep);
 	QVariantMap LookAtRebind(bool i_bPerformer) const;
 	void Rebind(bool i_bPerformer, bool i_bMeasure);
-	/// The document's function of this name.
+	// The document's functions of these names.
 	QVariantMap CompareWith(const QString& i_rPath);
+	QVariantMap Advise() { return Review("Advise"); }
+	QVariantMap CheckPose() { return Review("CheckPose"); }
 	/// By name.
 	QStringList SourceSegments() const { return SegmentsOf("SourceSegmentModel"); }
 	QStringList TargetSegments() const { return SegmentsOf("TargetSegmentModel"); }
@@ -160,6 +162,7 @@ private:
 	    std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameters);
 
 	QString AskDocument(const char* i_pQuestion) const;
+	QVariantMap Review(const char* i_pQuestion);
 	bool SaveBy(const char* i_pCommand, const QString& i_rPath);
 	std::shared_ptr<TesselPluginInterface::IParameter> Parameter(const char* i_pName) const;
 	bool SetParameter(const char* i_pName, const QString& i_rPath);

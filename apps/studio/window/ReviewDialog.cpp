@@ -23,7 +23,7 @@ namespace
 {
 
 /// No column but the last is wider, in pixels.
-constexpr int c_WidestColumn = 240;
+constexpr int c_WidestColumn = 200;
 
 QVariantMap RowOf(const QTreeWidgetItem* i_pItem)
 {
@@ -36,7 +36,8 @@ VReviewDialog::VReviewDialog(const VReview& i_rReview, VRetargetPanel& i_rPanel,
     TesselPluginInterface::ISelection& io_rSelection, QWidget* i_pParent)
     : QDialog(i_pParent), m_Review(i_rReview), m_rPanel(i_rPanel), m_rSelection(io_rSelection),
       m_pSummary(Named(new QLabel, "ReviewSummary", tr("In a sentence"))),
-      m_pRows(Named(new QTreeWidget, "ReviewRows", i_rReview.m_Title))
+      m_pRows(Named(new QTreeWidget, "ReviewRows", i_rReview.m_Title)),
+      m_pWhole(Named(new QLabel, "ReviewWhole", tr("The chosen row in full")))
 {
 	Named(this, i_rReview.m_pName, i_rReview.m_Title);
 	setWindowTitle(i_rReview.m_Title);
@@ -46,21 +47,22 @@ VReviewDialog::VReviewDialog(const VReview& i_rReview, VRetargetPanel& i_rPanel,
 	m_pRows->setHeaderHidden(i_rReview.m_Columns.size() == 1);
 	m_pRows->setRootIsDecorated(false);
 	m_pRows->setAllColumnsShowFocus(true);
-	m_pRows->setWordWrap(true);
+	m_pWhole->setWordWrap(true);
+	m_pWhole->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
 	m_pRows->header()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
 	connect(m_pRows, &QTreeWidget::currentItemChanged, this, &VReviewDialog::ChooseRow);
 
 	auto* const pButtons = Named(new QDialogButtonBox(QDialogButtonBox::Close), "ReviewButtons", tr("What to do"));
-	const auto add = [&](const char* i_pName, const QString& i_rText, void (VReviewDialog::*i_pPressed)())
+	const auto add = [&](const char* i_pName, const QString& i_rText, const auto& i_rPressed)
 	{
 		auto* const pButton =
 		    Named(pButtons->addButton(i_rText, QDialogButtonBox::ActionRole), i_pName, QString(i_rText).remove('&'));
 		pButton->setAutoDefault(false);
-		connect(pButton, &QPushButton::clicked, this, i_pPressed);
+		connect(pButton, &QPushButton::clicked, this, i_rPressed);
 		return pButton;
 	};
 	if (!i_rReview.m_Action.isEmpty())
-		m_pAction = add("ReviewAct", i_rReview.m_Action, &VReviewDialog::Act);
+		add("ReviewAct", i_rReview.m_Action, i_rReview.m_Act);
 	add("ReviewCopy", tr("C&opy"), &VReviewDialog::Copy)->setShortcut(QKeySequence::Copy);
 	add("ReviewAgain", tr("&Look Again"), &VReviewDialog::LookAgain);
 	Named(pButtons->button(QDialogButtonBox::Close), "ReviewClose", tr("Close"));
@@ -70,6 +72,7 @@ VReviewDialog::VReviewDialog(const VReview& i_rReview, VRetargetPanel& i_rPanel,
 	auto* const pLayout = new QVBoxLayout(this);
 	pLayout->addWidget(m_pSummary);
 	pLayout->addWidget(m_pRows, 1);
+	pLayout->addWidget(m_pWhole);
 	pLayout->addWidget(pButtons);
 	resize(620, 480);
 	StandBesideView(*this);
@@ -90,10 +93,7 @@ bool VReviewDialog::Look()
 		auto* const pItem = new QTreeWidgetItem(m_pRows, cells);
 		pItem->setData(0, Qt::UserRole, rRow);
 		for (int column = 0; column < cells.size(); ++column)
-		{
 			pItem->setToolTip(column, PlainToolTip(cells[column]));
-			pItem->setTextAlignment(column, Qt::AlignLeft | Qt::AlignTop);
-		}
 	}
 	for (int column = 0; column + 1 < m_pRows->columnCount(); ++column)
 	{
@@ -113,8 +113,9 @@ void VReviewDialog::LookAgain()
 void VReviewDialog::ChooseRow()
 {
 	const QVariantMap row = RowOf(m_pRows->currentItem());
-	if (m_pAction)
-		m_pAction->setEnabled(m_Review.m_CanAct(row));
+	QStringList whole = row["cells"].toStringList();
+	whole.removeAll({});
+	m_pWhole->setText(whole.join(QStringLiteral(": ")));
 	if (const auto items = m_rPanel.ItemsNamedIn(row["about"].toString()); !items.empty())
 		m_rSelection.Replace(items);
 }
@@ -125,11 +126,6 @@ void VReviewDialog::Copy()
 	for (int row = 0; row < m_pRows->topLevelItemCount(); ++row)
 		text += RowOf(m_pRows->topLevelItem(row))["cells"].toStringList().join('\t') + '\n';
 	QApplication::clipboard()->setText(text.isEmpty() ? m_pSummary->text() : text);
-}
-
-void VReviewDialog::Act()
-{
-	m_Review.m_Act(RowOf(m_pRows->currentItem()));
 }
 
 } // namespace StudioHost

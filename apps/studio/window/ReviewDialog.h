@@ -7,7 +7,6 @@
 #include <functional>
 
 class QLabel;
-class QPushButton;
 class QTreeWidget;
 
 namespace TesselPluginInterface
@@ -31,9 +30,7 @@ struct VReview
 	std::function<QVariantMap()> m_Look;
 	/// A button of its own; none without a text.
 	QString m_Action = {};
-	std::function<void(const QVariantMap& i_rRow)> m_Act = {};
-	/// Which row it can be pressed for; it is given an empty one where none is chosen.
-	std::function<bool(const QVariantMap& i_rRow)> m_CanAct = {};
+	std::function<void()> m_Act = {};
 };
 
 /// Shows it. What the chosen row is about is selected, so that lists and view show it. The table stays as it was while
@@ -55,14 +52,13 @@ private:
 	void ChooseRow();
 	/// All rows as lines of a table, cells by tabulators.
 	void Copy();
-	void Act();
 
 	const VReview m_Review;
 	VRetargetPanel& m_rPanel;
 	TesselPluginInterface::ISelection& m_rSelection;
 	QLabel* const m_pSummary;
 	QTreeWidget* const m_pRows;
-	QPushButton* m_pAction = nullptr;
+	QLabel* const m_pWhole;
 };
 
 } // namespace StudioHost

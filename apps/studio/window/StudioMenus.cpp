@@ -80,8 +80,9 @@ constexpr VCommandRow c_CommandRows[] = {
 
 } // namespace
 
-const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 4> VStudioWindow::c_Dialogs = {
-    {{"align", &VStudioWindow::ShowAlignment}, {"compare", &VStudioWindow::CompareWithSaved},
+const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 6> VStudioWindow::c_Dialogs = {
+    {{"advice", &VStudioWindow::ShowAdvice}, {"align", &VStudioWindow::ShowAlignment},
+        {"check-pose", &VStudioWindow::ShowPoseCheck}, {"compare", &VStudioWindow::CompareWithSaved},
         {"preferences", &VStudioWindow::ShowPreferences}, {"propose", &VStudioWindow::ShowProposal}}};
 
 QAction* VStudioWindow::AddAction(QMenu& io_rMenu, const char* i_pName, const QString& i_rText,
@@ -248,6 +249,8 @@ void VStudioWindow::MakeToolsMenu()
 	AddAction(rMenu, "RebindToFbx", tr("Re-bind to the &FBX..."), {}, [this] { ShowRebind(false, true); });
 	AddAction(rMenu, "RebindToPerformer", tr("Re-bind to the Pe&rformer..."), {}, [this] { ShowRebind(true, true); });
 	rMenu.addSeparator();
+	AddAction(rMenu, "CheckPose", tr("Check P&ose"), {}, [this] { ShowPoseCheck(); });
+	AddAction(rMenu, "ShowAdvice", tr("A&dvice..."), {}, [this] { ShowAdvice(); });
 	AddAction(rMenu, "CompareWith", tr("&Compare with..."), {}, [this] { AskAndCompare(); });
 	AddAction(rMenu, "CompareWithSaved", tr("Compare with Its File as Sa&ved"), {}, [this] { CompareWithSaved(); });
 	rMenu.addSeparator();

@@ -48,4 +48,19 @@ void VStudioWindow::CompareWith(const QString& i_rPath)
 	    [this, i_rPath] { return m_pRetargetPanel->CompareWith(i_rPath); }});
 }
 
+void VStudioWindow::ShowAdvice()
+{
+	if (m_pRetargetPanel)
+		ShowReview(
+		    {"Advice", tr("Advice"), {tr("Joint or target"), tr("Verdict"), tr("Bind pose without it"), tr("Why")},
+		        [this] { return m_pRetargetPanel->Advise(); }});
+}
+
+void VStudioWindow::ShowPoseCheck()
+{
+	if (m_pRetargetPanel)
+		ShowReview({"PoseCheck", tr("Check Pose"), {tr("What"), tr("Looks"), tr("How the two stand"), tr("Mended by")},
+		    [this] { return m_pRetargetPanel->CheckPose(); }, tr("&Align to Source..."), [this] { ShowAlignment(); }});
+}
+
 } // namespace StudioHost

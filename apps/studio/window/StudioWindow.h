@@ -81,7 +81,7 @@ protected:
 
 private:
 	/// Names of dialogs and what shows them.
-	static const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 4> c_Dialogs;
+	static const std::array<std::pair<const char*, void (VStudioWindow::*)()>, 6> c_Dialogs;
 
 	void MakeMenus(bool i_bDeveloper);
 	void MakeFileMenu();
@@ -116,6 +116,8 @@ private:
 	/// With the file that the target subject is of; asks for one if there is none.
 	void CompareWithSaved();
 	void CompareWith(const QString& i_rPath);
+	void ShowAdvice();
+	void ShowPoseCheck();
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
 	void ShowOperatorPage();

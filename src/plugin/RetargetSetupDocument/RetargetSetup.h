@@ -10,6 +10,12 @@
 #include <QVariant>
 
 #include <memory>
+#include <vector>
+
+namespace SetupProposal
+{
+struct VPoseFinding;
+}
 
 /// The document as QML sees it: the properties, signals and list models of what VRetargetSetupCore keeps and does. A
 /// command that changed nothing says why by commandIgnored.
@@ -98,6 +104,13 @@ public:
 
 	/// In what it differs from a file, which is the earlier one. Cells: a sentence.
 	Q_INVOKABLE QVariantMap CompareWith(const QUrl& i_rFileURL);
+	/// Which joints could go, and which targets pull against each other while the source goes through its range. The
+	/// skin is that of the FBX file that was read last, if the target subject was made of it. Cells: joint or target,
+	/// verdict, what the bind pose would be without the joint, why.
+	Q_INVOKABLE QVariantMap Advise();
+	/// How source and target subject differ as they stand at rest. Cells: what, "fine" or "look", a sentence with the
+	/// numbers, what mends it.
+	Q_INVOKABLE QVariantMap CheckPose();
 
 	// For a host that offers Undo and Redo.
 
@@ -168,6 +181,8 @@ private:
 	void TargetFound(int i_TargetIndex) override { emit targetFound(i_TargetIndex); }
 	void TargetSubjectBroughtBack(const boost::filesystem::path& i_rFile) override;
 	void CommandIgnored(const char* i_pCommand, const std::string& i_rReason) override;
+
+	std::vector<SetupProposal::VPoseFinding> PoseFindings(const SetupProposal::VProposal& i_rProposal) const;
 
 	/// Empty, and the command is ignored, if the URL is not of a local file.
 	boost::filesystem::path LocalPath(const char* i_pCommand, const QUrl& i_rFileURL);

@@ -1,6 +1,10 @@
 // What VRetargetSetup tells of its target subject, as tables that a host shows.
 
+#include "RetargetSetupCore/IgnoredCommands.h"
+#include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
+#include "SetupProposal/PoseCheck.h"
+#include "SetupReview/advice/Advice.h"
 #include "SetupReview/compare/CompareDocument.h"
 
 #include <QStringList>
@@ -36,6 +40,88 @@ QVariantMap VRetargetSetup::CompareWith(const QUrl& i_rFileURL)
 	}
 	return {{"summary",
 	            rows.isEmpty() ? QStringLiteral("Nothing differs.")
-	                           : QString("From the file to what is here now, %1 differ:").arg(rows.size())},
+	                           : QString("Differences, from the file to what is here now: %1").arg(rows.size())},
+	    {"rows", rows}};
+}
+
+QVariantMap VRetargetSetup::Advise()
+{
+	const VSubjectValues target = TargetValues();
+	if (!target.m_pParametrised || !target.m_pApplicationData)
+	{
+		CommandIgnored("Advise", RetargetSetup::Ignored::c_NoTarget);
+		return {};
+	}
+	const bool bItsFile = target.m_pApplicationData->m_Skin == GetTargetName() && !GetTargetFBXPath().empty();
+	auto advice = SetupReview::AdviceOn(*this, bItsFile ? GetTargetFBXPath() : boost::filesystem::path());
+	if (!advice)
+		advice = SetupReview::AdviceOn(*this, {});
+	QVariantList rows;
+	for (const SetupReview::VPruneAdvice& rAdvice : advice->m_Prune)
+	{
+		const QString joint = QString::fromStdString(target.m_pParametrised->m_Segments[rAdvice.m_Segment].m_Name);
+		rows << Row({joint, SetupReview::NameOf(rAdvice.m_Verdict),
+		                QString::fromStdString(SetupReview::PoseChangeText(rAdvice, *target.m_pParametrised)),
+		                QString::fromStdString(rAdvice.m_Words)},
+		    '"' + joint + '"');
+	}
+	QString summary = rows.isEmpty() ? QStringLiteral("Every joint carries a target.")
+	                                 : QString("Joints without a target of their own: %1.").arg(rows.size());
+	if (!advice->m_bSkin && !rows.isEmpty())
+		summary += QStringLiteral(" Which must stay for the skin is not known: the character's FBX file is not open.");
+	if (!advice->m_Range)
+		return {{"summary", summary + QStringLiteral(" Without a source skeleton there is no range of motion.")},
+		    {"rows", rows}};
+	for (const SetupReview::VRangeConflict& rConflict : advice->m_Range->m_Conflicts)
+	{
+		const QString missed = "target " + QString::fromStdString(rConflict.m_TargetName);
+		rows << Row(
+		    {missed, QStringLiteral("is pulled"), {},
+		        QString("target %1 pulls against it: it %2")
+		            .arg(QString::fromStdString(rConflict.m_AgainstName), QString::fromStdString(rConflict.m_Words))},
+		    missed);
+	}
+	return {{"summary", summary + ' ' + QString::fromStdString(SetupReview::RangeSummary(*advice->m_Range)) + '.'},
+	    {"rows", rows}};
+}
+
+std::vector<SetupProposal::VPoseFinding> VRetargetSetup::PoseFindings(const SetupProposal::VProposal& i_rProposal) const
+{
+	const VSubjectValues source = SourceValues();
+	const VSubjectValues target = TargetValues();
+	return SetupProposal::CheckPose(RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject),
+	    RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject), i_rProposal);
+}
+
+QVariantMap VRetargetSetup::CheckPose()
+{
+	constexpr const char* c_Command = "CheckPose";
+	const char* const pMissing = !SourceValues().m_pParametrised ? RetargetSetup::Ignored::c_NoSource
+	    : !TargetValues().m_pParametrised                        ? RetargetSetup::Ignored::c_NoTarget
+	                                                             : nullptr;
+	if (pMissing)
+	{
+		CommandIgnored(c_Command, pMissing);
+		return {};
+	}
+	const auto proposal = VRetargetSetupCore::ProposeTargets(SetupProposal::c_DefaultLeastScore);
+	if (!proposal)
+		return {};
+	QVariantList rows;
+	int toMend = 0;
+	for (const SetupProposal::VPoseFinding& rFinding : PoseFindings(*proposal))
+	{
+		const QString message = QString::fromStdString(rFinding.m_Message);
+		const QString options = QString::fromStdString(rFinding.m_Options);
+		rows << Row({rFinding.m_pId, rFinding.m_bFine ? QStringLiteral("fine") : QStringLiteral("look"), message,
+		                options.isEmpty() ? QString()
+		                                  : QString("\"Align to Source...\", or retarget edit with %1").arg(options)},
+		    message);
+		toMend += !rFinding.m_bFine;
+	}
+	const QString summary = rows.isEmpty() ? QString::fromStdString(proposal->m_NoBody)
+	    : toMend == 0                      ? QStringLiteral("Both stand alike.")
+	                                       : QString("To be looked at: %1 of %2.").arg(toMend).arg(rows.size());
+	return {{"summary", summary.isEmpty() ? QStringLiteral("There is no pair to compare the two by.") : summary},
 	    {"rows", rows}};
 }

@@ -1,7 +1,6 @@
 // What VRetargetSetup hands out of proposals, as values that a host knows without our types.
 
 #include "RetargetSetupCore/Presets.h"
-#include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
@@ -83,9 +82,7 @@ QVariantMap VRetargetSetup::ProposeTargets(double i_LeastScore)
 		unmapped << QVariantMap{
 		    {"source", int(rUnmapped.m_Joint)}, {"reason", QString::fromStdString(rUnmapped.m_Reason)}};
 	QStringList findings;
-	for (const SetupProposal::VPoseFinding& rFinding :
-	    SetupProposal::CheckPose(RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject),
-	        RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject), *proposal))
+	for (const SetupProposal::VPoseFinding& rFinding : PoseFindings(*proposal))
 		if (!rFinding.m_bFine)
 			findings << QString::fromStdString(rFinding.m_Message);
 	return {{"pairs", ToList(proposal->m_Pairs, both)}, {"alternatives", ToList(proposal->m_Alternatives, both)},
