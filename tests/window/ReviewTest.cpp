@@ -11,6 +11,7 @@
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QLabel>
+#include <QMessageBox>
 #include <QProcess>
 #include <QTest>
 #include <QTreeWidget>
@@ -158,6 +159,25 @@ TEST_F(Review, ChecksThePose)
 	EXPECT_EVENTUALLY(!Dialog("AlignToSource"));
 	Press("PoseCheck", "ReviewAgain");
 	EXPECT_FALSE(Copied("PoseCheck").contains("\tlook\t"));
+}
+
+TEST_F(Review, WritesAReport)
+{
+	m_pOperator->AnswerNextDialog(File("hero"));
+	m_pOperator->ChooseInMenu("ToolsMenu", "WriteReport");
+	EXPECT_EVENTUALLY(QFile::exists(File("hero.html")));
+	Run({"report", File("hero.qrr"), "--source", File("performer.qrs"), "--fbx", File("character.fbx"), "-o",
+	    File("expected.html")});
+	EXPECT_TRUE(Content("hero.html") == Content("expected.html"));
+	EXPECT_EVENTUALLY(!m_pWindow->findChild<QObject*>("ReportRun"));
+	// Of what is not saved; a page that stands there is asked about.
+	m_pOperator->Click("removeUnnecessaryJoints");
+	EXPECT_EVENTUALLY(m_pWindow->isWindowModified());
+	m_pOperator->AnswerNextDialog(File("hero.html"));
+	m_pOperator->AnswerNextQuestion("hero.html is there already. Do you want to replace it?", QMessageBox::Yes);
+	m_pOperator->ChooseInMenu("ToolsMenu", "WriteReport");
+	EXPECT_EVENTUALLY(Content("hero.html") != Content("expected.html"));
+	EXPECT_TRUE(Content("hero.html").contains("</html>"));
 }
 
 } // namespace

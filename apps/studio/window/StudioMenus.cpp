@@ -253,6 +253,7 @@ void VStudioWindow::MakeToolsMenu()
 	AddAction(rMenu, "ShowAdvice", tr("A&dvice..."), {}, [this] { ShowAdvice(); });
 	AddAction(rMenu, "CompareWith", tr("&Compare with..."), {}, [this] { AskAndCompare(); });
 	AddAction(rMenu, "CompareWithSaved", tr("Compare with Its File as Sa&ved"), {}, [this] { CompareWithSaved(); });
+	AddAction(rMenu, "WriteReport", tr("&Write Report..."), {}, [this] { WriteReport(); });
 	rMenu.addSeparator();
 	AddAction(rMenu, "SavePreset", tr("&Save Targets as Preset..."), {}, [this] { SavePreset(); });
 }

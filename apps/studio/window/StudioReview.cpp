@@ -1,9 +1,12 @@
 // What the window tells of the target subject as it stands, beside the dialogs that change it.
 
+#include "DebugServices/GlobalLog.h"
 #include "TesselPluginInterface/PathTypes.h"
 #include "studio/host/Services.h"
+#include "studio/motion/TakePlayer.h"
 #include "studio/panel/FileKind.h"
 #include "studio/panel/RetargetPanel.h"
+#include "studio/window/ReportRun.h"
 #include "studio/window/ReviewDialog.h"
 #include "studio/window/StudioWindow.h"
 
@@ -61,6 +64,25 @@ void VStudioWindow::ShowPoseCheck()
 	if (m_pRetargetPanel)
 		ShowReview({"PoseCheck", tr("Check Pose"), {tr("What"), tr("Looks"), tr("How the two stand"), tr("Mended by")},
 		    [this] { return m_pRetargetPanel->CheckPose(); }, tr("&Align to Source..."), [this] { ShowAlignment(); }});
+}
+
+void VStudioWindow::WriteReport()
+{
+	const auto refuse = [](const QString& i_rWhy)
+	{ NVX_LOG("Command", NVX::ELogWarning, "Write Report: %1%", i_rWhy.toStdString()); };
+	const QString why = m_pRetargetPanel ? m_pRetargetPanel->WhyNotSave() : tr("no panel is open");
+	if (!why.isEmpty())
+		return refuse(why);
+	if (VReportRun::Program().isEmpty())
+		return refuse(tr("the program retarget, which writes it, does not stand beside this one: install it"));
+	const QString file =
+	    AskWhereToSave(FolderOf(TesselPluginInterface::c_FolderKeys[TesselPluginInterface::EPathRetargets]),
+	        tr("Pages (*.html)"), QStringLiteral(".html"));
+	if (file.isEmpty())
+		return;
+	// One at a time.
+	delete findChild<VReportRun*>();
+	new VReportRun(*m_pRetargetPanel, Motion().Path(), file, *this);
 }
 
 } // namespace StudioHost

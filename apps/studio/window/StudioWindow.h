@@ -118,6 +118,8 @@ private:
 	void CompareWith(const QString& i_rPath);
 	void ShowAdvice();
 	void ShowPoseCheck();
+	/// Of the present state, with the take that plays.
+	void WriteReport();
 	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
 	void ShowOperatorPage();
