@@ -290,6 +290,5 @@ int main(int i_Count, char** i_ppArguments)
 {
 	return Ratios::Main(i_Count, i_ppArguments,
 	    {{"Update", "Floor", 0.6, {"30", "70", "100", "300", "1000"}}, {"Update", "Floor", 0.8, {"3000"}},
-	        {"Update", "KDLChain", 0.35}, {"UpdateMany", "UpdateEach", 1 / 1.8},
-	        {"UpdateManyTwoThreads", "UpdateManyAlone", 0.6}});
+	        {"Update", "KDLChain", 0.35}, {"UpdateMany", "UpdateEach", 1 / 1.8}});
 }

@@ -35,25 +35,33 @@ VPair EvaluateFit(VPair x, TFit i_Fit)
 	    + (i_Fit(8) + i_Fit(9) * x + i_Fit(10) * x2) * (x4 * x4);
 }
 
-/// Up to c_LargestFitted without a root, a division or a sine. Both 0 for an angle below c_SmallestAngle.
-inline VRodriguesFactors<double> RodriguesFactors(double i_Square)
+/// Whether the fits tell them.
+inline bool IsFitted(double i_Square)
+{
+	return i_Square >= c_SmallestAngle * c_SmallestAngle && i_Square <= c_LargestFitted;
+}
+
+/// Of other angles: both 0 below c_SmallestAngle. Rare, and kept out of the code that calls it.
+[[gnu::noinline]] inline VRodriguesFactors<double> UnfittedFactors(double i_Square)
 {
 	if (i_Square < c_SmallestAngle * c_SmallestAngle)
 		return {0.0, 0.0};
-	if (!(i_Square <= c_LargestFitted))
-	{
-		const double angle = std::sqrt(i_Square);
-		return {std::sin(angle) / angle, (1.0 - std::cos(angle)) / i_Square};
-	}
+	const double angle = std::sqrt(i_Square);
+	return {std::sin(angle) / angle, (1.0 - std::cos(angle)) / i_Square};
+}
+
+/// Up to c_LargestFitted without a root, a division or a sine.
+inline VRodriguesFactors<double> RodriguesFactors(double i_Square)
+{
+	if (!IsFitted(i_Square))
+		return UnfittedFactors(i_Square);
 	const VPair both = EvaluateFit(VPair{i_Square, i_Square}, [](int n) { return c_SineCosineFit[n]; });
 	return {both[0], both[1]};
 }
 
 inline VRodriguesFactors<VLanes> RodriguesFactors(VLanes i_Square)
 {
-	const auto isFitted = [&](int i_Lane)
-	{ return i_Square[i_Lane] >= c_SmallestAngle * c_SmallestAngle && i_Square[i_Lane] <= c_LargestFitted; };
-	if (!isFitted(0) || !isFitted(1))
+	if (!IsFitted(i_Square[0]) || !IsFitted(i_Square[1]))
 	{
 		const auto first = RodriguesFactors(i_Square[0]);
 		const auto second = RodriguesFactors(i_Square[1]);

@@ -21,8 +21,10 @@ public:
 
 	void Move(const double*& io_rpState, Rotation::VPose<double>& o_rPose) override
 	{
+		// Of what was given, not of what was just stored: a pair read from two stores that are under way waits for both.
+		const double* const pState = io_rpState;
 		m_Joint.SetState(io_rpState);
-		m_Joint.GetPose(o_rPose);
+		T::Motion(pState, o_rPose);
 	}
 
 	void MoveLanes(const Rotation::VLanes*& io_rpState, Rotation::VPose<Rotation::VLanes>& o_rPose) const override
