@@ -21,7 +21,8 @@ public:
 
 	void Move(const double*& io_rpState, Rotation::VPose<double>& o_rPose) override
 	{
-		// Of what was given, not of what was just stored: a pair read from two stores that are under way waits for both.
+		// Of what was given, not of what was just stored: a pair read from two stores that are under way waits for
+		// both.
 		const double* const pState = io_rpState;
 		m_Joint.SetState(io_rpState);
 		T::Motion(pState, o_rPose);
