@@ -1,8 +1,11 @@
 #include "math/NumberText.h"
 
 #include <algorithm>
+#include <array>
+#include <bit>
 #include <charconv>
 #include <cmath>
+#include <cstdint>
 #include <limits>
 #include <locale.h>
 #include <stdlib.h>
@@ -93,6 +96,79 @@ bool AppendNotFinite(std::string& io_rText, double i_Value)
 	return true;
 }
 
+constexpr std::uint64_t PowerOf(std::uint64_t i_Base, int i_Exponent)
+{
+	return i_Exponent == 0 ? 1 : i_Base * PowerOf(i_Base, i_Exponent - 1);
+}
+
+constexpr int c_RoundTripDigits = 17;
+constexpr std::uint64_t c_TenToDigits = PowerOf(10, c_RoundTripDigits);
+
+/// 17 significant digits of the magnitude, to the nearest, ties to even, and the power of ten of the first of them, for
+/// magnitudes from 1e-4 to 1e16. There the product of the mantissa and the power of five that brings them in front of
+/// the point has at most 102 bits: all of it is exact.
+std::uint64_t RoundTripDigits(double i_Magnitude, int& o_rExponent)
+{
+	__extension__ using VWide = unsigned __int128;
+	constexpr auto c_Fives = []
+	{
+		std::array<std::uint64_t, c_RoundTripDigits + 5> fives{};
+		for (int i = 0; i < int(fives.size()); ++i)
+			fives[std::size_t(i)] = PowerOf(5, i);
+		return fives;
+	}();
+	const auto bits = std::bit_cast<std::uint64_t>(i_Magnitude);
+	const int exponentOfTwo = int(bits >> 52) - 1075;
+	const std::uint64_t mantissa = (bits & ((std::uint64_t(1) << 52) - 1)) | std::uint64_t(1) << 52;
+	// At most one too low: log10(2) = 0.30103.
+	o_rExponent = int(std::floor((exponentOfTwo + 52) * 0.30102999));
+	for (;; ++o_rExponent)
+	{
+		const int power = c_RoundTripDigits - 1 - o_rExponent;
+		const VWide product = VWide(mantissa) * c_Fives[std::size_t(power)];
+		const int shift = -(exponentOfTwo + power);
+		if (shift <= 0)
+		{
+			if ((product << -shift) < c_TenToDigits)
+				return std::uint64_t(product << -shift);
+			continue;
+		}
+		std::uint64_t digits = std::uint64_t(product >> shift);
+		if (digits >= c_TenToDigits)
+			continue;
+		const VWide rest = product & ((VWide(1) << shift) - 1);
+		const VWide half = VWide(1) << (shift - 1);
+		digits += rest > half || (rest == half && digits % 2 == 1);
+		if (digits < c_TenToDigits)
+			return digits;
+		++o_rExponent;
+		return c_TenToDigits / 10;
+	}
+}
+
+/// As "%.17g" has them, which is without an exponent where RoundTripDigits takes the magnitude.
+void AppendRoundTripDigits(std::string& io_rText, double i_Value)
+{
+	int exponent = 0;
+	const std::uint64_t number = RoundTripDigits(std::abs(i_Value), exponent);
+	char digits[c_RoundTripDigits];
+	std::to_chars(digits, digits + c_RoundTripDigits, number);
+	std::size_t count = c_RoundTripDigits;
+	while (digits[count - 1] == '0')
+		--count;
+	if (i_Value < 0)
+		io_rText += '-';
+	if (exponent < 0)
+	{
+		io_rText.append("0.000", std::size_t(1 - exponent)).append(digits, count);
+		return;
+	}
+	const std::size_t whole = std::size_t(exponent) + 1;
+	io_rText.append(digits, whole);
+	if (count > whole)
+		(io_rText += '.').append(digits + whole, count - whole);
+}
+
 } // namespace
 
 std::size_t NumberText::ScanReal(std::string_view i_Text, double& o_rValue)
@@ -173,7 +249,13 @@ void NumberText::AppendG(std::string& io_rText, double i_Value, int i_Digits)
 
 void NumberText::AppendG17(std::string& io_rText, double i_Value)
 {
-	AppendG(io_rText, i_Value, 17);
+	const double magnitude = std::abs(i_Value);
+	if (magnitude >= 1e-4 && magnitude < 1e16)
+		AppendRoundTripDigits(io_rText, i_Value);
+	else if (magnitude == 0.0)
+		io_rText += std::signbit(i_Value) ? "-0" : "0";
+	else
+		AppendG(io_rText, i_Value, c_RoundTripDigits);
 }
 
 std::string NumberText::PrintG17(double i_Value)

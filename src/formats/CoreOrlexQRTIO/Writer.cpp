@@ -31,7 +31,7 @@ constexpr std::string_view c_SchemaInstance = "http://www.w3.org/2001/XMLSchema-
 constexpr std::string_view c_SchemaLocation = "Orlex_QRT_Schema.xsd";
 
 const std::string* NameOf(VWriterNode& io_rNode, VWriting& io_rWriting, const auto& i_rElements,
-    const std::unordered_map<std::string_view, std::uint32_t>& i_rFirst, std::uint32_t i_Index, const char* i_pKind)
+    const std::vector<std::uint32_t>& i_rFirst, std::uint32_t i_Index, const char* i_pKind)
 {
 	if (i_Index >= i_rElements.size())
 	{
@@ -41,12 +41,11 @@ const std::string* NameOf(VWriterNode& io_rNode, VWriting& io_rWriting, const au
 		return nullptr;
 	}
 	const std::string& rName = i_rElements[i_Index].m_Name;
-	const auto first = i_rFirst.find(rName);
-	if (first != i_rFirst.end() && first->second != i_Index)
+	if (i_rFirst[i_Index] != i_Index)
 		io_rWriting.m_Warnings.push_back(
 		    (boost::format("%1% element refers to %2% %3%, but a reader finds %2% %4%, which has the same name '%5%'.",
 		         std::locale::classic())
-		        % io_rNode.GetName() % i_pKind % i_Index % first->second % rName)
+		        % io_rNode.GetName() % i_pKind % i_Index % i_rFirst[i_Index] % rName)
 		        .str());
 	return &rName;
 }

@@ -42,13 +42,11 @@ public:
 		return true;
 	}
 
-	bool ToText(T i_Value, std::string& o_rText) const
+	/// Null if the value has no text. The text lives as long as the table.
+	const std::string* FindText(T i_Value) const
 	{
 		const auto it = m_ValueToText.find(i_Value);
-		if (it == m_ValueToText.end())
-			return false;
-		o_rText = it->second;
-		return true;
+		return it == m_ValueToText.end() ? nullptr : &it->second;
 	}
 
 	const std::string& GetName() const override { return m_Name; }

@@ -41,20 +41,6 @@ constexpr VEscapes AttributeEscapes(unsigned char i_OtherQuote)
 constexpr VEscapes c_DoubleQuotedEscapes = AttributeEscapes('\'');
 constexpr VEscapes c_SingleQuotedEscapes = AttributeEscapes('"');
 
-/// True for nearly all values: they are written as they stand, within quotes of either kind.
-bool StandsForItself(std::string_view i_Text)
-{
-	const auto isEscaped = [](const auto& i_rBytes)
-	{
-		return (i_rBytes == '<') | (i_rBytes == '>') | (i_rBytes == '&') | (i_rBytes == '"') | (i_rBytes == '\'')
-		    | (i_rBytes == '\t') | (i_rBytes == '\n') | (i_rBytes == '\r');
-	};
-	for (; i_Text.size() >= sizeof(UtilsRapidXml::VBlock); i_Text.remove_prefix(sizeof(UtilsRapidXml::VBlock)))
-		if (UtilsRapidXml::BlockHas(i_Text.data(), isEscaped))
-			return false;
-	return std::none_of(i_Text.begin(), i_Text.end(), isEscaped);
-}
-
 void AppendEscaped(std::string_view i_Text, const VEscapes& i_rEscapes, std::string& io_rText)
 {
 	std::size_t begin = 0;
@@ -115,6 +101,20 @@ bool Open(const VXmlNode& i_rNode, std::size_t i_Depth, std::string& io_rText)
 }
 
 } // namespace
+
+bool UtilsRapidXml::StandsForItself(std::string_view i_Text)
+{
+	const auto isOther = [](const auto& i_rBytes)
+	{
+		return (i_rBytes < ' ') | (i_rBytes == '<') | (i_rBytes == '>') | (i_rBytes == '&') | (i_rBytes == '"')
+		    | (i_rBytes == '\'');
+	};
+	for (; i_Text.size() >= sizeof(VBlock); i_Text.remove_prefix(sizeof(VBlock)))
+		if (BlockHas(i_Text.data(), isOther))
+			return false;
+	return std::none_of(
+	    i_Text.begin(), i_Text.end(), [&](char i_Byte) { return isOther(static_cast<signed char>(i_Byte)); });
+}
 
 void UtilsRapidXml::PrintAttribute(std::string_view i_Name, std::string_view i_Value, std::string& io_rText)
 {

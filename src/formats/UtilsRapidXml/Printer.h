@@ -18,6 +18,9 @@ std::string Print(const VXmlNode& i_rDocument);
 inline constexpr std::pair<std::string_view, std::string_view> c_Declaration[] = {
     {"version", "1.0"}, {"encoding", "UTF-8"}, {"standalone", "no"}};
 
+/// True for nearly all values of attributes: printable ASCII that no quote of either kind lets mean something else.
+bool StandsForItself(std::string_view i_Text);
+
 /// An attribute of an element that is open, as Print writes it.
 void PrintAttribute(std::string_view i_Name, std::string_view i_Value, std::string& io_rText);
 

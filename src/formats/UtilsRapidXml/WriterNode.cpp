@@ -32,6 +32,14 @@ void VWriterNode::Open()
 	m_AttributesEnd = m_rText.size();
 }
 
+void VWriterNode::EndAttribute(std::size_t i_Begin)
+{
+	if (m_bHasChildren)
+		std::rotate(m_rText.begin() + std::ptrdiff_t(m_AttributesEnd), m_rText.begin() + std::ptrdiff_t(i_Begin),
+		    m_rText.end());
+	m_AttributesEnd += m_rText.size() - i_Begin;
+}
+
 void VWriterNode::Close()
 {
 	if (m_bHasChildren)
@@ -46,22 +54,23 @@ bool VWriterNode::WriteAttribute(
 	// The document itself has no attributes.
 	if (m_Depth == 0 || !InRange(GetVersion(), i_Minimum, i_Maximum))
 		return false;
+	if (StandsForItself(i_Text))
+	{
+		WriteAttributeInPlace(i_Name, [&](std::string& io_rText) { io_rText += i_Text; });
+		return true;
+	}
 	if (FindBrokenCharacter(i_Text) != std::string_view::npos)
 	{
 		m_pGlobal->m_Errors.Add("%1% node's %2% attribute has bytes that XML cannot hold.", m_Name, i_Name);
 		return false;
 	}
-	const std::size_t end = m_rText.size();
+	const std::size_t begin = m_rText.size();
 	PrintAttribute(i_Name, i_Text, m_rText);
-	if (m_bHasChildren)
-		std::rotate(
-		    m_rText.begin() + std::ptrdiff_t(m_AttributesEnd), m_rText.begin() + std::ptrdiff_t(end), m_rText.end());
-	m_AttributesEnd += m_rText.size() - end;
+	EndAttribute(begin);
 	return true;
 }
 
-bool VWriterNode::WriteElement(std::string_view i_Name, const std::function<void(VWriterNode&)>& i_rCallback,
-    VVersion i_Minimum, VVersion i_Maximum)
+bool VWriterNode::BeginChild(std::string_view i_Name, VVersion i_Minimum, VVersion i_Maximum)
 {
 	if (!InRange(GetVersion(), i_Minimum, i_Maximum))
 		return false;
@@ -73,10 +82,6 @@ bool VWriterNode::WriteElement(std::string_view i_Name, const std::function<void
 	}
 	if (!std::exchange(m_bHasChildren, true))
 		m_rText += ">\n";
-	VWriterNode child(m_rText, i_Name, m_Depth + 1, m_pGlobal);
-	child.Open();
-	i_rCallback(child);
-	child.Close();
 	return true;
 }
 

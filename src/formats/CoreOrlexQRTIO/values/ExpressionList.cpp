@@ -54,14 +54,15 @@ bool IsPlainNumber(std::string_view i_Text)
 
 bool JoinExpressions(std::span<const std::string> i_Expressions, std::string& o_rText)
 {
+	const auto isSpecial = [](char i_Byte) { return i_Byte == ' ' || i_Byte == '\t' || i_Byte == '\''; };
 	o_rText.clear();
 	bool bPlain = true;
 	for (const std::string& rExpression : i_Expressions)
 	{
 		if (!o_rText.empty())
 			o_rText += ' ';
-		o_rText += rExpression.empty() ? "0" : rExpression;
-		bPlain = bPlain && rExpression.find_first_of(" \t'") == std::string::npos;
+		o_rText += rExpression.empty() ? std::string_view("0") : rExpression;
+		bPlain = bPlain && std::ranges::none_of(rExpression, isSpecial);
 	}
 	if (bPlain)
 		return true;

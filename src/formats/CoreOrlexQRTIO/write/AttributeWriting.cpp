@@ -23,20 +23,21 @@ void WriteRealList(
 {
 	if ((i_Values.empty() && !i_rAttribute.m_bRequired) || !IsInVersion(io_rNode, i_rAttribute))
 		return;
-	std::string text;
-	text.reserve(20 * i_Values.size());
-	for (const double value : i_Values)
-	{
-		if (!text.empty())
-			text += ' ';
-		if (!std::isfinite(value))
-			return AddNotStringified(io_rNode, i_rAttribute);
-		if (i_bPlaceholders && value == CoreOrlexTypes::c_NotSet)
-			text += '*';
-		else
-			NumberText::AppendG17(text, value);
-	}
-	WriteRaw(io_rNode, i_rAttribute, text);
+	if (!std::ranges::all_of(i_Values, [](double i_Value) { return std::isfinite(i_Value); }))
+		return AddNotStringified(io_rNode, i_rAttribute);
+	io_rNode.WriteAttributeInPlace(i_rAttribute.m_Name,
+	    [&](std::string& io_rText)
+	    {
+		    for (const double& rValue : i_Values)
+		    {
+			    if (&rValue != i_Values.data())
+				    io_rText += ' ';
+			    if (i_bPlaceholders && rValue == CoreOrlexTypes::c_NotSet)
+				    io_rText += '*';
+			    else
+				    NumberText::AppendG17(io_rText, rValue);
+		    }
+	    });
 }
 
 } // namespace

@@ -54,11 +54,10 @@ template <typename T>
 void WriteEnum(UtilsRapidXml::VWriterNode& io_rNode, const Format::VAttribute& i_rAttribute,
     const UtilsRapidXml::VEnum<T>& i_rEnum, T i_Value)
 {
-	std::string text;
 	if (!IsInVersion(io_rNode, i_rAttribute))
 		return;
-	if (i_rEnum.ToText(i_Value, text))
-		WriteRaw(io_rNode, i_rAttribute, text);
+	if (const std::string* const pText = i_rEnum.FindText(i_Value))
+		WriteRaw(io_rNode, i_rAttribute, *pText);
 	else
 		AddNotStringified(io_rNode, i_rAttribute);
 }

@@ -48,6 +48,11 @@ void WriteMarker(VWriterNode& io_rNode, VWriting& io_rWriting, const VMarker& i_
 	WriteReal(io_rNode, Table::c_Radius, i_rMarker.m_Radius);
 	WriteColourOrCount(io_rNode, io_rWriting, Table::c_Colour, i_rApplicationData.m_Colour);
 	WriteText(io_rNode, Table::c_Descriptor, i_rExtras.m_Descriptor);
+	WriteEnum(io_rNode, Table::c_Status, EnumTables::Status(),
+	    static_cast<std::uint32_t>(i_rMarker.m_Status) | (i_rMarker.m_Missing ? EnumTables::c_StatusMissing : 0));
+	if (i_pTarget && !i_pTarget->m_ViewNormals.empty())
+		WriteReals(io_rNode, Table::c_ViewNormal, i_pTarget->m_ViewNormals[0]);
+	WriteReal(io_rNode, Table::c_ViewAngle, i_rMarker.m_ViewAngle);
 	if (i_pTarget)
 		WriteElement(io_rNode, Table::c_MarkerTemplate,
 		    [&](VWriterNode& io_rTemplate)
@@ -57,11 +62,6 @@ void WriteMarker(VWriterNode& io_rNode, VWriting& io_rWriting, const VMarker& i_
 			    WriteText(io_rTemplate, Format::MarkerTemplate::c_PlacementCovariance,
 			        i_rExtras.m_TemplatePlacementCovariance);
 		    });
-	WriteEnum(io_rNode, Table::c_Status, EnumTables::Status(),
-	    static_cast<std::uint32_t>(i_rMarker.m_Status) | (i_rMarker.m_Missing ? EnumTables::c_StatusMissing : 0));
-	if (i_pTarget && !i_pTarget->m_ViewNormals.empty())
-		WriteReals(io_rNode, Table::c_ViewNormal, i_pTarget->m_ViewNormals[0]);
-	WriteReal(io_rNode, Table::c_ViewAngle, i_rMarker.m_ViewAngle);
 }
 
 void WriteStick(VWriterNode& io_rNode, VWriting& io_rWriting, const VSubjectApplicationData::VStick& i_rStick)

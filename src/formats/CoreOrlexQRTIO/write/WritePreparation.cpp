@@ -84,17 +84,20 @@ VTexts Printed(const Rotation::VVector3& i_rVector)
 /// What files up to 3.1 hold of the segment's pose in the joint's frame: as it was read, if that still yields what the
 /// segment holds.
 void PreparePost(
-    VWriting& io_rWriting, const VSubjectParametrised::VSegment& i_rSegment, VSubjectQRTExtras::VJoint& io_rExtras)
+    VWriting& io_rWriting, const VSubjectParametrised::VSegment& i_rSegment, VPreparedSegment& io_rPrepared)
 {
-	const std::optional<VJointPose> post = PostPose(io_rWriting.m_rParser, io_rExtras);
+	const std::optional<VJointPose> post = PostPose(io_rWriting.m_rParser, io_rPrepared.Extras().m_Joint);
 	const VJointPose held{i_rSegment.m_InversePostRotation, i_rSegment.m_InversePostTranslation};
 	if (post && Inverse(*post) == held)
 		return;
 	const VJointPose computed = Inverse(held);
-	io_rExtras.m_PostOrientation = Printed(computed.m_Rotation);
-	io_rExtras.m_PostPosition = Printed(computed.m_Translation);
-	io_rExtras.m_TemplatePostOrientation.assign(computed.m_Rotation.begin(), computed.m_Rotation.end());
-	io_rExtras.m_TemplatePostPosition.assign(computed.m_Translation.begin(), computed.m_Translation.end());
+	io_rPrepared.m_pComputedExtras = std::make_unique<VSubjectQRTExtras::VSegment>(io_rPrepared.Extras());
+	io_rPrepared.m_pExtras = io_rPrepared.m_pComputedExtras.get();
+	VSubjectQRTExtras::VJoint& rExtras = io_rPrepared.m_pComputedExtras->m_Joint;
+	rExtras.m_PostOrientation = Printed(computed.m_Rotation);
+	rExtras.m_PostPosition = Printed(computed.m_Translation);
+	rExtras.m_TemplatePostOrientation.assign(computed.m_Rotation.begin(), computed.m_Rotation.end());
+	rExtras.m_TemplatePostPosition.assign(computed.m_Translation.begin(), computed.m_Translation.end());
 }
 
 /// The axes as they were read, if they still yield the orientation that the joint holds.
@@ -103,7 +106,7 @@ void PrepareAxes(const VJoint& i_rJoint, VPreparedSegment& io_rPrepared)
 	if (AxesSize(i_rJoint.m_JointType) == 0)
 		return;
 	Rotation::VVector3 orientation{};
-	const std::vector<double>& rRead = io_rPrepared.m_Extras.m_Joint.m_Axis;
+	const std::vector<double>& rRead = io_rPrepared.Extras().m_Joint.m_Axis;
 	if (JointOrientation(i_rJoint.m_JointType, rRead, io_rPrepared.m_PrePose, orientation) == EAxesResult::Fine
 	    && orientation == i_rJoint.m_JointOrientation)
 		io_rPrepared.m_Axes = rRead;
@@ -123,7 +126,7 @@ void PrepareT(VWriting& io_rWriting)
 	{
 		const std::size_t size = CoreOrlexTypes::StateSize(rSegments[i].m_Joint.m_JointType);
 		sizeOfAll += size;
-		if (io_rWriting.m_Segments[i].m_Extras.m_Joint.m_bHasT)
+		if (io_rWriting.m_Segments[i].Extras().m_Joint.m_bHasT)
 			sizeAsRead += size;
 	}
 	const bool bAsRead = rConstraints.size() == sizeAsRead;
@@ -140,7 +143,7 @@ void PrepareT(VWriting& io_rWriting)
 	}
 	std::span<const double> rest = rConstraints;
 	for (std::size_t i = 0; i < rSegments.size(); ++i)
-		if (!bAsRead || io_rWriting.m_Segments[i].m_Extras.m_Joint.m_bHasT)
+		if (!bAsRead || io_rWriting.m_Segments[i].Extras().m_Joint.m_bHasT)
 		{
 			const std::size_t size = CoreOrlexTypes::StateSize(rSegments[i].m_Joint.m_JointType);
 			io_rWriting.m_Segments[i].m_T = rest.first(size);
@@ -149,19 +152,25 @@ void PrepareT(VWriting& io_rWriting)
 }
 
 /// Names lose blanks at their ends in a file, where two must not become one.
-bool CheckNames(VWriting& io_rWriting, const auto& i_rElements, const char* i_pKind, VTexts& io_rErrors)
+/// @param o_rFirst For each element the first one of its name.
+bool CheckNames(VWriting& io_rWriting, const auto& i_rElements, const char* i_pKind,
+    std::vector<std::uint32_t>& o_rFirst, VTexts& io_rErrors)
 {
 	const std::size_t errors = io_rErrors.size();
-	std::unordered_map<std::string_view, std::string_view> firstOf;
+	std::unordered_map<std::string_view, std::uint32_t> firstOf;
+	firstOf.reserve(i_rElements.size());
+	o_rFirst.reserve(i_rElements.size());
 	for (const auto& rElement : i_rElements)
 	{
 		const std::string_view name = rElement.m_Name;
 		const std::string_view written = Trimmed(name);
-		const auto [it, bFirst] = firstOf.emplace(written, name);
-		if (it->second != name)
+		const auto [it, bFirst] = firstOf.emplace(written, static_cast<std::uint32_t>(o_rFirst.size()));
+		o_rFirst.push_back(it->second);
+		const std::string_view first = i_rElements[it->second].m_Name;
+		if (first != name)
 			io_rErrors.push_back((boost::format("%1% '%2%' and %1% '%3%' would have one name in a file, which holds no "
 			                                    "blanks at the ends of a name: rename one of them.")
-			    % i_pKind % it->second % name)
+			    % i_pKind % first % name)
 			                         .str());
 		else if (bFirst && written.size() != name.size())
 			io_rWriting.m_Warnings.push_back(
@@ -182,27 +191,25 @@ bool Prepare(VWriting& io_rWriting, VTexts& io_rErrors)
 	io_rWriting.m_Segments.resize(rSubject.m_Segments.size());
 	if (!PrepareTree(io_rWriting, io_rErrors))
 		return false;
-	bool bFine = CheckNames(io_rWriting, rSubject.m_Segments, "Segment", io_rErrors);
-	bFine &= CheckNames(io_rWriting, rSubject.m_Markers, "Marker", io_rErrors);
-	bFine &= CheckNames(io_rWriting, rSubject.m_Rotations, "Rotation observation", io_rErrors);
+	bool bFine = CheckNames(io_rWriting, rSubject.m_Segments, "Segment", io_rWriting.m_FirstSegments, io_rErrors);
+	bFine &= CheckNames(io_rWriting, rSubject.m_Markers, "Marker", io_rWriting.m_FirstMarkers, io_rErrors);
+	std::vector<std::uint32_t> firstObservations;
+	bFine &= CheckNames(io_rWriting, rSubject.m_Rotations, "Rotation observation", firstObservations, io_rErrors);
 	VRecordsByName<VSubjectQRTExtras::VSegment> extras(io_rWriting.m_rExtras.m_Segments);
+	static const VSubjectQRTExtras::VSegment s_NothingRead;
 	for (std::size_t i = 0; i < rSubject.m_Segments.size(); ++i)
 	{
 		const VSubjectParametrised::VSegment& rSegment = rSubject.m_Segments[i];
 		VPreparedSegment& rPrepared = io_rWriting.m_Segments[i];
-		if (const VSubjectQRTExtras::VSegment* const pRead = extras.Find(i, rSegment.m_Name))
-			rPrepared.m_Extras = *pRead;
+		const VSubjectQRTExtras::VSegment* const pRead = extras.Find(i, rSegment.m_Name);
+		rPrepared.m_pExtras = pRead ? pRead : &s_NothingRead;
 		bFine &= Evaluate(io_rWriting, rSegment.m_PreRotation, rPrepared.m_PrePose.m_Rotation, io_rErrors);
 		bFine &= Evaluate(io_rWriting, rSegment.m_PreTranslation, rPrepared.m_PrePose.m_Translation, io_rErrors);
 		if (io_rWriting.m_Version < Format::c_3_2)
-			PreparePost(io_rWriting, rSegment, rPrepared.m_Extras.m_Joint);
+			PreparePost(io_rWriting, rSegment, rPrepared);
 		PrepareAxes(rSegment.m_Joint, rPrepared);
 	}
 	PrepareT(io_rWriting);
-	for (std::uint32_t i = 0; i < rSubject.m_Segments.size(); ++i)
-		io_rWriting.m_FirstSegments.emplace(rSubject.m_Segments[i].m_Name, i);
-	for (std::uint32_t i = 0; i < rSubject.m_Markers.size(); ++i)
-		io_rWriting.m_FirstMarkers.emplace(rSubject.m_Markers[i].m_Name, i);
 	return bFine;
 }
 

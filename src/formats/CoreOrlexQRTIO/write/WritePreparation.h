@@ -6,6 +6,7 @@
 #include "CoreOrlexTypes/SubjectParametrised.h"
 #include "UtilsRapidXml/Version.h"
 
+#include <memory>
 #include <span>
 #include <string>
 #include <unordered_map>
@@ -47,7 +48,11 @@ private:
 /// A segment with what has to be computed before it can be written.
 struct VPreparedSegment
 {
-	VSubjectQRTExtras::VSegment m_Extras;
+	const VSubjectQRTExtras::VSegment& Extras() const { return *m_pExtras; }
+
+	/// What was read with the segment, or what the version being written needs instead, which is held here.
+	const VSubjectQRTExtras::VSegment* m_pExtras = nullptr;
+	std::unique_ptr<VSubjectQRTExtras::VSegment> m_pComputedExtras;
 	std::vector<std::uint32_t> m_Children;
 	VJointPose m_PrePose;
 	/// The joint's share of the T-pose constraints.
@@ -68,9 +73,9 @@ struct VWriting
 	std::vector<std::string> m_Warnings{};
 	std::size_t m_CountOfLostColours = 0;
 	std::vector<VPreparedSegment> m_Segments{};
-	/// Where a name stands first, which is what a reference to it finds.
-	std::unordered_map<std::string_view, std::uint32_t> m_FirstSegments{};
-	std::unordered_map<std::string_view, std::uint32_t> m_FirstMarkers{};
+	/// For each element the first one of its name, which is what a reference to it finds.
+	std::vector<std::uint32_t> m_FirstSegments{};
+	std::vector<std::uint32_t> m_FirstMarkers{};
 	std::vector<std::uint32_t> m_Roots{};
 };
 

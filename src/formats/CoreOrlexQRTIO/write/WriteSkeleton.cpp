@@ -44,7 +44,7 @@ void WriteJoint(VWriterNode& io_rNode, const VSubjectParametrised::VSegment& i_r
 {
 	namespace Table = Format::Joint;
 	const VJoint& rJoint = i_rSegment.m_Joint;
-	const VSubjectQRTExtras::VJoint& rExtras = i_rPrepared.m_Extras.m_Joint;
+	const VSubjectQRTExtras::VJoint& rExtras = i_rPrepared.Extras().m_Joint;
 	WriteText(io_rNode, Table::c_Name, rJoint.m_Name);
 	WriteReals(io_rNode, Table::c_PreOrientation, i_rPrepared.m_PrePose.m_Rotation);
 	WriteReals(io_rNode, Table::c_PrePosition, i_rPrepared.m_PrePose.m_Translation);
@@ -67,8 +67,6 @@ void WriteJoint(VWriterNode& io_rNode, const VSubjectParametrised::VSegment& i_r
 		WriteReals(io_rNode, Table::c_RangeCentringState, rJoint.m_RangeCentringState);
 		WriteReals(io_rNode, Table::c_RangeMatrix, rJoint.m_RangeMatrix);
 	}
-	WriteElement(io_rNode, Table::c_JointTemplate,
-	    [&](VWriterNode& io_rTemplate) { WriteJointTemplate(io_rTemplate, i_rSegment, rExtras); });
 	if (rJoint.m_JointType == VJoint::EFree || rJoint.m_JointType == VJoint::EBall)
 	{
 		if (i_rApplicationData.m_EulerOrder != VSubjectApplicationData::VJoint::ENone)
@@ -77,6 +75,8 @@ void WriteJoint(VWriterNode& io_rNode, const VSubjectParametrised::VSegment& i_r
 	else
 		WriteReals(io_rNode, rJoint.m_JointType == VJoint::EHardySpicer ? Table::c_AxisPair : Table::c_Axis,
 		    i_rPrepared.m_Axes);
+	WriteElement(io_rNode, Table::c_JointTemplate,
+	    [&](VWriterNode& io_rTemplate) { WriteJointTemplate(io_rTemplate, i_rSegment, rExtras); });
 }
 
 /// All of a segment but its children, in a frame of its own: a chain of segments is walked by recursion.
@@ -104,8 +104,10 @@ void WriteJoint(VWriterNode& io_rNode, const VSubjectParametrised::VSegment& i_r
 	WriteReal(io_rNode, Table::c_DrawTwist, rApplicationData.m_DrawTwist);
 	WriteReal(io_rNode, Table::c_DrawWidth, rApplicationData.m_DrawWidth);
 	WriteText(io_rNode, Table::c_Part, rApplicationData.m_Part);
-	WriteText(io_rNode, Table::c_Covariance, rPrepared.m_Extras.m_Covariance);
-	WriteText(io_rNode, Table::c_Size, rPrepared.m_Extras.m_Size);
+	WriteText(io_rNode, Table::c_Covariance, rPrepared.Extras().m_Covariance);
+	WriteText(io_rNode, Table::c_Size, rPrepared.Extras().m_Size);
+	WriteEnum(io_rNode, Table::c_DrawStyle, EnumTables::DrawStyle(), rApplicationData.m_DrawStyle);
+	WriteEnum(io_rNode, Table::c_DrawShading, EnumTables::DrawShading(), rApplicationData.m_DrawShading);
 
 	const VJointElement* const pJoint = FindJointElement(
 	    [&](const VJointElement& i_rElement) { return i_rElement.m_Type == rSegment.m_Joint.m_JointType; });
@@ -115,9 +117,6 @@ void WriteJoint(VWriterNode& io_rNode, const VSubjectParametrised::VSegment& i_r
 	else
 		io_rNode.AddError(
 		    (boost::format("Segment '%1%' has a joint of a type that a file cannot hold.") % rSegment.m_Name).str());
-
-	WriteEnum(io_rNode, Table::c_DrawStyle, EnumTables::DrawStyle(), rApplicationData.m_DrawStyle);
-	WriteEnum(io_rNode, Table::c_DrawShading, EnumTables::DrawShading(), rApplicationData.m_DrawShading);
 }
 
 void WriteSegment(VWriterNode& io_rNode, VWriting& io_rWriting, std::uint32_t i_Index)
