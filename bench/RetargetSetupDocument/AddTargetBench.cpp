@@ -55,6 +55,6 @@ BENCHMARK_CAPTURE(SetPose, history, true)->Name("SetPoseUndoable")->Apply(Sizes)
 int main(int i_Count, char** i_ppArguments)
 {
 	return Ratios::Main(i_Count, i_ppArguments,
-	    {{"AddTarget", "Copies", 6.0}, {"SetPose", "Copies", 6.0}, {"AddTargetUndoable", "AddTarget", 1.3},
+	    {{"AddTarget", "Copies", 2.5}, {"SetPose", "Copies", 2.5}, {"AddTargetUndoable", "AddTarget", 1.3},
 	        {"SetPoseUndoable", "SetPose", 1.1}});
 }

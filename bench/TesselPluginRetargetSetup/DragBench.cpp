@@ -70,5 +70,5 @@ BENCHMARK(MoveOfADrag)->Apply(Sizes);
 
 int main(int i_Count, char** i_ppArguments)
 {
-	return Frames::Main(i_Count, i_ppArguments, {{"MoveOfADrag", "Copies", 8.0}});
+	return Frames::Main(i_Count, i_ppArguments, {{"MoveOfADrag", "Copies", 2.5}});
 }

@@ -4,6 +4,9 @@
 
 #include <gtest/gtest.h>
 
+#include <bit>
+#include <random>
+
 namespace
 {
 
@@ -33,6 +36,34 @@ protected:
 	VDynamicExpressionParserSimple m_Parser;
 	std::string m_Error;
 };
+
+/// Products are evaluated without the parser, which the full context asks always.
+TEST_F(StaticExpressionParser, EvaluatesProductsAsTheParserDoes)
+{
+	ASSERT_TRUE(m_Parser.AddStaticParameter("Arm", -3.7, m_Error));
+	ASSERT_TRUE(m_Parser.AddStaticParameter("1", 5.0, m_Error));
+	m_Parser.SetVariable("Arm", 0.1);
+	m_Parser.SetVariable("e", 3.0);
+	std::mt19937 random(3);
+	const char* const pParts[] = {"-", "+", "*", "0", "12.5", "3", ".", "e", "1e3", "Arm", "'Arm'", "1", " ", "1.#INF",
+	    "inf", "0x1", "99999999999999999999999999", "B"};
+	std::size_t fine = 0;
+	for (int round = 0; round < 50000; ++round)
+	{
+		std::string text;
+		for (std::size_t parts = 1 + random() % 4; parts > 0; --parts)
+			text += pParts[random() % std::size(pParts)];
+		double value = 7.0;
+		double parsed = 7.0;
+		std::string error;
+		const bool bGood = m_Parser.Evaluate(text, value, error);
+		ASSERT_EQ(m_Parser.Evaluate(text, parsed, m_Error, EExpressionContext::EFull), bGood) << text;
+		ASSERT_EQ(std::bit_cast<std::uint64_t>(value), std::bit_cast<std::uint64_t>(parsed)) << text;
+		ASSERT_EQ(error, m_Error) << text;
+		fine += bGood;
+	}
+	EXPECT_GT(fine, 5000u);
+}
 
 TEST_F(StaticExpressionParser, AddsInOrder)
 {

@@ -48,6 +48,9 @@ public:
 		return pValue ? this->MakeVariable(i_Name, *pValue) : nullptr;
 	}
 
+	/// The components without a node; null if there is no such variable.
+	const std::vector<double>* FindVariable(std::string_view i_Name) const { return m_Variables.Find(i_Name); }
+
 	void ClearVariables() override { m_Variables.Clear(); }
 
 private:
@@ -65,6 +68,9 @@ public:
 		const std::vector<double>* const pValue = m_Constants.Find(i_Name);
 		return pValue ? this->MakeConstant(i_Name, *pValue) : nullptr;
 	}
+
+	/// The components without a node; null if there is no such constant.
+	const std::vector<double>* FindConstant(std::string_view i_Name) const { return m_Constants.Find(i_Name); }
 
 	void ClearConstants() override { m_Constants.Clear(); }
 

@@ -2,6 +2,7 @@
 
 #include "math/NumberText.h"
 
+#include <algorithm>
 #include <limits>
 
 namespace Math
@@ -43,6 +44,12 @@ EToken OperatorType(char i_Byte)
 }
 
 } // namespace
+
+bool IsIdentifier(std::string_view i_Text)
+{
+	return !i_Text.empty() && !IsDigitOrPoint(i_Text.front())
+	    && std::all_of(i_Text.begin(), i_Text.end(), IsOfIdentifier);
+}
 
 VMathCursor::VMathCursor(std::string_view i_Text, char i_Delimiter)
     : m_pBegin(i_Text.data()), m_pAt(m_pBegin), m_pEnd(m_pBegin + i_Text.size()), m_Delimiter(i_Delimiter)

@@ -52,6 +52,9 @@ struct VToken
 	double Value = 0.0;
 };
 
+/// True for a name that needs no quotes in an expression: letters, digits and "_", the first no digit.
+bool IsIdentifier(std::string_view i_Text);
+
 /// A view on the text of an expression; the text must outlive it.
 class VMathCursor
 {

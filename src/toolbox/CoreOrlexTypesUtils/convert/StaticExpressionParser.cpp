@@ -1,6 +1,9 @@
 #include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 
 #include "DebugServices/Assert.h"
+#include "math/MathTokenizer.h"
+
+#include <charconv>
 
 namespace CoreOrlexTypesUtils
 {
@@ -258,9 +261,43 @@ bool VDynamicExpressionParserBase<TLinearFactory>::Initialise(
 }
 
 template <typename TLinearFactory>
+bool VDynamicExpressionParserBase<TLinearFactory>::EvaluateProduct(
+    std::string_view i_Expression, double& o_rValue) const
+{
+	const char* const pEnd = i_Expression.data() + i_Expression.size();
+	const char* const pDigits = i_Expression.data() + i_Expression.starts_with('-');
+	if (pDigits == pEnd || !((*pDigits >= '0' && *pDigits <= '9') || *pDigits == '.'))
+		return false;
+	double number = 0.0;
+	const auto result = std::from_chars(i_Expression.data(), pEnd, number, std::chars_format::fixed);
+	if (result.ec != std::errc())
+		return false;
+	double factor = 1.0;
+	if (result.ptr != pEnd)
+	{
+		if (*result.ptr != '*')
+			return false;
+		const std::string_view name(result.ptr + 1, pEnd);
+		const std::vector<double>* pValue = m_LinearFactory.FindVariable(name);
+		if (!pValue)
+			pValue = m_LinearFactory.FindConstant(name);
+		if (!pValue || !Math::IsIdentifier(name))
+			return false;
+		factor = pValue->front();
+	}
+	o_rValue = number * factor;
+	return true;
+}
+
+template <typename TLinearFactory>
 bool VDynamicExpressionParserBase<TLinearFactory>::Evaluate(
     std::string_view i_Expression, double& o_rValue, std::string& o_rError, EExpressionContext i_Context) const
 {
+	if (i_Context == EExpressionContext::ELinear && EvaluateProduct(i_Expression, o_rValue))
+	{
+		o_rError.clear();
+		return true;
+	}
 	const Math::VMathParser& rParser = i_Context == EExpressionContext::EStatic ? StaticParser()
 	    : i_Context == EExpressionContext::EFull                                ? m_FullParser
 	                                                                            : m_LinearParser;

@@ -171,6 +171,10 @@ private:
 		m_FullFactory.SetConstant(i_rName, VSingleElementIVector(i_Value));
 	}
 
+	/// The value in the linear context of a decimal number, or of one times a parameter, which is what nearly all
+	/// expressions are. Leaves the others, those with an error among them, to the parser.
+	bool EvaluateProduct(std::string_view i_Expression, double& o_rValue) const;
+
 	// Told to keep expressions only while one is asked for its names or text.
 	mutable TLinearFactory m_LinearFactory;
 	Math::VMathParser m_LinearParser;
