@@ -128,7 +128,7 @@ void Command(VRetargetSetup& io_rDocument, FuzzedDataProvider& io_rInput)
 		return QVariantMap{
 		    {"source", index()}, {"target", index()}, {"position", io_rInput.ConsumeBool()}, {"weight", number()}};
 	};
-	switch (io_rInput.ConsumeIntegralInRange<int>(0, 17))
+	switch (io_rInput.ConsumeIntegralInRange<int>(0, 18))
 	{
 	case 0: return io_rDocument.AddTarget(index(), index(), io_rInput.ConsumeBool(), io_rInput.ConsumeBool());
 	case 1: return io_rDocument.RemoveTarget(index());
@@ -162,6 +162,7 @@ void Command(VRetargetSetup& io_rDocument, FuzzedDataProvider& io_rInput)
 		    Qt::UserRole + io_rInput.ConsumeIntegralInRange<int>(0, 20));
 		return;
 	}
+	case 17: return io_rDocument.RemoveJoint(index());
 	default:
 	{
 		VSubjectParametrised subject = MakeAnySubject(io_rInput);

@@ -118,7 +118,7 @@ TEST(FilePose, MatchingTurnsSegmentsWithoutAJointByTheirPreRotation)
 	VSubjectParametrised subject = BuildScaled(bones, 1.0);
 	CoreOrlexQRTIO::VSubjectQRTExtras extras;
 	subject.m_Targets.emplace_back().m_SegmentIndices = {2};
-	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
+	RetargetSetup::RemoveJoints(subject, extras, RetargetSetup::JointsWithoutTargets(subject));
 	const RetargetSetup::VFileMatch match = RetargetSetup::MatchFilePose(subject, bones, YUp());
 	EXPECT_EQ(match.m_PreRotations, std::vector<std::size_t>{1});
 	EXPECT_TRUE(subject.m_Segments[1].m_Joint.m_BindPose.empty());

@@ -37,7 +37,7 @@ std::string JointTypes(const VSubjectParametrised& i_rSubject)
 void Prune(VSubjectParametrised& io_rSubject)
 {
 	VSubjectQRTExtras extras;
-	RemoveJointsWithoutTargets(io_rSubject, extras);
+	RemoveJoints(io_rSubject, extras, JointsWithoutTargets(io_rSubject));
 }
 
 TEST(EnableJoint, LeavesAJointThatIsThere)
@@ -154,7 +154,7 @@ TEST(TPoseConstraints, StayInStepWithTheJoints)
 			extras.m_Segments.emplace_back().m_Name = subject.m_Segments[i].m_Name;
 			extras.m_Segments.back().m_Joint.m_bHasT = rRow.m_HasT[i];
 		}
-		RemoveJointsWithoutTargets(subject, extras);
+		RemoveJoints(subject, extras, JointsWithoutTargets(subject));
 		EXPECT_EQ(subject.m_TPoseConstraints, rRow.m_Pruned);
 		EnableAllJoints(subject, extras);
 		EXPECT_EQ(subject.m_TPoseConstraints, rRow.m_Restored);

@@ -61,6 +61,7 @@ TEST_F(History, EachEditComesBackUnderItsName)
 	} rows[] = {{"Create Target Subject", [&] { m_Document.CreateTargetSubject(); }},
 	    {"Add Target", [&] { m_Document.AddTarget(0, 0, true, false); }},
 	    {"Add Target", [&] { m_Document.AddTarget(1, 1, false, true); }},
+	    {"Remove Joint", [&] { m_Document.RemoveJoint(1); }},
 	    {"Remove Unnecessary Joints", [&] { m_Document.RemoveUnnecessaryJoints(); }},
 	    {"Create All Joints", [&] { m_Document.CreateAllJoints(); }},
 	    {"Pose Segment", [&] { Pose(m_Document, 0.5, {RetargetSetup::Steps::c_Pose}); }},
@@ -95,7 +96,7 @@ TEST_F(History, EachEditComesBackUnderItsName)
 		EXPECT_EQ(now.m_pSubject, states[i_State].m_pSubject);
 		EXPECT_EQ(now.m_pApplicationData, states[i_State].m_pApplicationData);
 		EXPECT_EQ(m_Document.TargetIdentity(0), numbers[i_State]);
-		EXPECT_EQ(m_Document.ScaleRootHeight(), i_State >= 10);
+		EXPECT_EQ(m_Document.ScaleRootHeight(), i_State >= 11);
 	};
 	for (std::size_t i = std::size(rows); i-- > 0;)
 	{

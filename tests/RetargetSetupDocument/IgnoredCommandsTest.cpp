@@ -56,6 +56,7 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	    {"nothing", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); }, c_NoSource},
 	    {"nothing", [] {}, "CreateAllJoints", [this] { m_Document.CreateAllJoints(); }, c_NoTarget},
 	    {"nothing", [] {}, "RemoveUnnecessaryJoints", [this] { m_Document.RemoveUnnecessaryJoints(); }, c_NoTarget},
+	    {"nothing", [] {}, "RemoveJoint", [this] { m_Document.RemoveJoint(1); }, c_NoTarget},
 	    {"nothing", [] {}, "SaveTargetSubjectURL", [this] { m_Document.SaveTargetSubjectURL(Url("a.qrr")); },
 	        c_NoTarget},
 	    {"nothing", [] {}, "MatchFilePose", [this] { m_Document.MatchFilePose(); }, c_NoTarget},
@@ -76,6 +77,8 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	    {"both", [this] { SetSmallSubjects(); }, "AddTarget", [this] { m_Document.AddTarget(-1, 0, true, true); },
 	        "No single segment of the source subject is selected."},
 	    {"both", [] {}, "MatchFilePose", [this] { m_Document.MatchFilePose(); }, c_NotItsFBX},
+	    {"both", [] {}, "RemoveJoint", [this] { m_Document.RemoveJoint(0); },
+	        "The target subject has no such segment with a joint that can go; the root's stays."},
 	    {"its FBX, a hinge",
 	        [this]
 	        {

@@ -45,6 +45,20 @@ TEST_F(Advise, JointsThatCouldGo)
 	EXPECT_EQ(Joint({}, "RightLeg")["verdict"], "go");
 	for (const char* const pKept : {"Hips", "LeftHand"})
 		EXPECT_EQ(Joint({}, pKept)["verdict"], "not there") << pKept;
+	// One by one as advised, the rest by the edit for all.
+	EXPECT_EQ(Joint({}, "RightLeg")["options"], "--prune-joint RightLeg");
+	EXPECT_EQ(stay["options"], "");
+	const VRun told = m_Folder.Run({"-q", "advise", "x.qrr"});
+	EXPECT_NE(told.m_Out.find(" --prune-joint RightLeg "), std::string::npos) << told.m_Out;
+	ASSERT_EQ(m_Folder.Run({"-q", "edit", "x.qrr", "--prune-joint", "RightLeg", "-o", "x.qrr"}).m_Status, 0);
+	EXPECT_EQ(Joint({}, "RightLeg")["verdict"], "not there");
+	EXPECT_EQ(Joint({}, "LeftLeg")["verdict"], "go");
+	for (const auto& [pJoint, pWhy] : {std::pair("RightLeg", "has no joint that could go"), {"Hips", "is the root"}})
+	{
+		const VRun run = m_Folder.Run({"-q", "edit", "x.qrr", "--prune-joint", pJoint, "-o", "x.qrr"});
+		EXPECT_EQ(run.m_Status, 2);
+		EXPECT_NE(run.m_Err.find(pWhy), std::string::npos) << run.m_Err;
+	}
 	// As pruning all joints but those does: the hand stays where it is told to go.
 	ASSERT_EQ(m_Folder.Run({"-q", "edit", "x.qrr", "--prune-joints", "-o", "x.qrr"}).m_Status, 0);
 	EXPECT_EQ(Advice({})["prune"].size(), 0u);

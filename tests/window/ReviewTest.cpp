@@ -47,6 +47,10 @@ protected:
 		QTest::mouseClick(
 		    pDialog->windowHandle(), Qt::LeftButton, {}, pButton->mapTo(pDialog, pButton->rect().center()));
 	}
+	bool IsLookedAt(const char* i_pDialog) const
+	{
+		return Dialog(i_pDialog) && Dialog(i_pDialog)->findChild<QWidget*>("ReviewAgain")->isEnabled();
+	}
 	/// What the studio tells, as text.
 	QString Copied(const char* i_pDialog) const
 	{
@@ -114,6 +118,7 @@ TEST_F(Review, TellsWhatDiffersFromAFile)
 TEST_F(Review, AdvisesOnJointsAndTargets)
 {
 	m_pOperator->ChooseInMenu("ToolsMenu", "ShowAdvice");
+	EXPECT_EVENTUALLY(IsLookedAt("Advice"));
 	const QStringList told = Copied("Advice").split('\n', Qt::SkipEmptyParts);
 	const auto advice = QJsonDocument::fromJson(
 	    Run({"advise", File("hero.qrr"), "--source", File("performer.qrs"), "--fbx", File("character.fbx"), "--json"}));
@@ -132,9 +137,20 @@ TEST_F(Review, AdvisesOnJointsAndTargets)
 	EXPECT_EQ(Choose("Advice", "cape2"), QStringList("cape2"));
 	Choose("Advice", "target 22*");
 	EXPECT_EVENTUALLY(m_pOperator->Property("removeTarget", "enabled").toBool());
+	// One joint by the button, which then looks again.
+	const auto* const pRemove = Dialog("Advice")->findChild<QWidget*>("ReviewAct");
+	EXPECT_FALSE(pRemove->isEnabled()) << "a target is no joint";
+	Choose("Advice", "cape2");
+	Press("Advice", "ReviewAct");
+	EXPECT_EVENTUALLY(IsLookedAt("Advice") && !Copied("Advice").contains("cape2\t"));
+	EXPECT_TRUE(Copied("Advice").contains("cape3\t"));
+	m_pOperator->ChooseInMenu("EditMenu", "Undo");
+	Press("Advice", "ReviewAgain");
+	EXPECT_EVENTUALLY(IsLookedAt("Advice") && Copied("Advice").contains("cape2\t"));
 	// The button of the panel takes what could go.
 	m_pOperator->Click("removeUnnecessaryJoints");
 	Press("Advice", "ReviewAgain");
+	EXPECT_EVENTUALLY(IsLookedAt("Advice"));
 	EXPECT_FALSE(Copied("Advice").contains("\tgo\t"));
 }
 

@@ -7,6 +7,8 @@
 #include "retarget/text/Output.h"
 #include "retarget/text/Table.h"
 
+#include "SetupIO/CommandText.h"
+
 #include <unistd.h>
 
 namespace CommandLine
@@ -37,7 +39,8 @@ VJson ToJson(const std::vector<VPruneAdvice>& i_rAdvice, const VSubjectParametri
 			    {"degrees", AsDegrees(rAdvice.m_PoseChange->m_Angle)}};
 		list.push_back({{"index", rAdvice.m_Segment}, {"segment", i_rSubject.m_Segments[rAdvice.m_Segment].m_Name},
 		    {"verdict", SetupReview::NameOf(rAdvice.m_Verdict)}, {"targetsBelow", rAdvice.m_TargetsBelow},
-		    {"vertices", rAdvice.m_Vertices}, {"poseChange", change}, {"words", rAdvice.m_Words}});
+		    {"vertices", rAdvice.m_Vertices}, {"poseChange", change}, {"words", rAdvice.m_Words},
+		    {"options", rAdvice.m_Options}});
 	}
 	return list;
 }
@@ -58,7 +61,18 @@ VJson ToJson(const SetupReview::VRangeOfMotion& i_rRange, const VSubjectParametr
 	    {"conflicts", conflicts}, {"unopposed", i_rRange.m_Unopposed}};
 }
 
-std::string PruneText(const SetupReview::VAdvice& i_rAdvice, const VSubjectParametrised& i_rSubject)
+/// What removes the joints of this verdict; empty if there are none.
+std::string OptionsFor(const SetupReview::VAdvice& i_rAdvice, SetupReview::EPruneVerdict i_Verdict)
+{
+	std::string options;
+	for (const VPruneAdvice& rAdvice : i_rAdvice.m_Prune)
+		if (rAdvice.m_Verdict == i_Verdict)
+			options += " " + rAdvice.m_Options;
+	return options;
+}
+
+std::string PruneText(
+    const SetupReview::VAdvice& i_rAdvice, const VSubjectParametrised& i_rSubject, const std::string& i_rFile)
 {
 	if (i_rAdvice.m_Prune.empty())
 		return "Every joint carries a target\n";
@@ -70,7 +84,15 @@ std::string PruneText(const SetupReview::VAdvice& i_rAdvice, const VSubjectParam
 	for (const VPruneAdvice& rAdvice : i_rAdvice.m_Prune)
 		table.AddRow({i_rSubject.m_Segments[rAdvice.m_Segment].m_Name, SetupReview::NameOf(rAdvice.m_Verdict),
 		    SetupReview::PoseChangeText(rAdvice, i_rSubject), rAdvice.m_Words});
-	return "Joints without a target of their own\n" + table.Text(HasColours(STDOUT_FILENO), TerminalWidth());
+	std::string text =
+	    "Joints without a target of their own\n" + table.Text(HasColours(STDOUT_FILENO), TerminalWidth());
+	const std::string file = SetupIO::ForShell(i_rFile == "-" ? "FILE.qrr" : i_rFile);
+	for (const auto& [pWhich, verdict] : {std::pair("could go", SetupReview::EPruneVerdict::Go),
+	         {"may go, each for a look of its own", SetupReview::EPruneVerdict::May}})
+		if (const std::string options = OptionsFor(i_rAdvice, verdict); !options.empty())
+			text += std::string("\nThose that ") + pWhich + "\n  retarget edit " + Printable(file + options) + " -o "
+			    + Printable(file) + "\n";
+	return text;
 }
 
 std::string RangeText(const SetupReview::VRangeOfMotion& i_rRange)
@@ -95,7 +117,7 @@ EExitStatus Advise(const VAdviseSettings& i_rSettings)
 		session.LoadSource(i_rSettings.m_Source);
 	const SetupReview::VAdvice advice = AdviceOn(session, i_rSettings.m_Fbx);
 	VJson json{{"skin", advice.m_bSkin}, {"prune", ToJson(advice.m_Prune, session.Target())}};
-	std::string text = PruneText(advice, session.Target());
+	std::string text = PruneText(advice, session.Target(), i_rSettings.m_In);
 	if (advice.m_Range)
 	{
 		json["range"] = ToJson(*advice.m_Range, session.Source(""));

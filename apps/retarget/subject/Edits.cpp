@@ -230,12 +230,30 @@ void CreateJoints(VSession& io_rSession, const std::string&)
 	io_rSession.Document().CreateAllJoints();
 }
 
+void TellPrunedBehindMatch(const VSession& i_rSession, const char* i_pOption)
+{
+	if (i_rSession.m_bMatched)
+		NVX_LOG(c_pCategory, NVX::ELogWarning,
+		    "%1% after --match-file-pose: pruning moves what was matched; put --match-file-pose behind it", i_pOption);
+}
+
 void PruneJoints(VSession& io_rSession, const std::string&)
 {
-	if (io_rSession.m_bMatched)
-		NVX_LOG(c_pCategory, NVX::ELogWarning,
-		    "--prune-joints after --match-file-pose: pruning moves what was matched; put --match-file-pose behind it");
+	TellPrunedBehindMatch(io_rSession, "--prune-joints");
 	io_rSession.Document().RemoveUnnecessaryJoints();
+}
+
+void PruneJoint(VSession& io_rSession, const std::string& i_rSegment)
+{
+	const VSubjectParametrised& rSubject = io_rSession.Target();
+	const std::size_t segment = FindElement(i_rSegment, SegmentsOf(rSubject, "target segment"));
+	const auto& rSegment = rSubject.m_Segments[segment];
+	if (segment == 0 || rSegment.m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy)
+		throw VCommandError(EWrongUsage,
+		    "--prune-joint: \"" + rSegment.m_Name
+		        + (segment == 0 ? "\" is the root, whose joint stays" : "\" has no joint that could go"));
+	TellPrunedBehindMatch(io_rSession, "--prune-joint");
+	io_rSession.Document().RemoveJoint(std::int32_t(segment));
 }
 
 void Pose(VSession& io_rSession, const std::string& i_rValue)
@@ -383,6 +401,10 @@ constexpr VEditKind c_Kinds[] = {
         SwitchRootHeight},
     {"--create-joints", nullptr, "Give every segment without a joint a ball joint", CreateJoints},
     {"--prune-joints", nullptr, "Remove the joints of segments that carry no target", PruneJoints},
+    {"--prune-joint", "SEGMENT",
+        "Remove the joint of the target segment SEGMENT alone, whether it carries a target or not; \"retarget advise\" "
+        "tells which could go",
+        PruneJoint},
     {"--pose", "SEG=RX,RY,RZ[,TX,TY,TZ]",
         "Set the bind pose of the target segment SEG: an angle-axis in radians, for the root a translation in mm too",
         Pose},

@@ -34,7 +34,8 @@ void ForgetPoseWarnings()
 	    {
 		    for (const auto& [pCategory, pBegin] :
 		        {std::pair{"RetargetSetup", "Root bone '"}, {"RetargetSetup", "Removing joints changed the bind pose"},
-		            {c_pCategory, "The bind pose as built differs"}, {c_pCategory, "--prune-joints after"}})
+		            {c_pCategory, "The bind pose as built differs"}, {c_pCategory, "--prune-joints after"},
+		            {c_pCategory, "--prune-joint after"}})
 			    if (i_rCategory == pCategory && i_rText.starts_with(pBegin))
 				    return true;
 		    return false;

@@ -36,7 +36,7 @@ constexpr const char* c_pFbx = "TargetFBX";
 /// What the operator pressed, by the document's command.
 constexpr std::pair<const char*, const char*> c_Buttons[] = {{"CreateTargetSubject", "Create Target Subject"},
     {"LoadTargetSubjectURL", "Load"}, {"SaveTargetSubjectURL", "Save"}, {"AddTarget", "Add target"},
-    {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"},
+    {"RemoveTarget", "Remove target"}, {"CreateAllJoints", "Create all joints"}, {"RemoveJoint", "Remove Joint"},
     {"RemoveUnnecessaryJoints", "Remove unnecessary joints"}, {"MatchFilePose", "Take pose from FBX"},
     {"UpdateTargets", "Update targets"}, {"ProposeTargets", "Propose Targets"}, {"AddTargets", "Propose Targets"},
     {"AlignToSource", "Align to Source"}, {"CopyCommands", "Copy as Commands"}, {"SaveRecipe", "Save as Recipe"},
@@ -76,6 +76,7 @@ VRetargetPanel::VRetargetPanel(
 	connect(m_pDocument, SIGNAL(targetSubjectLoaded(QUrl)), this, SLOT(TellUsed(QUrl)));
 	connect(m_pDocument, SIGNAL(targetSubjectSaved(QUrl)), this, SLOT(TellUsed(QUrl)));
 	connect(m_pDocument, SIGNAL(unsavedChangesChanged()), this, SIGNAL(stateChanged()));
+	connect(m_pDocument, SIGNAL(advised(QVariantMap)), this, SIGNAL(advised(QVariantMap)));
 	connect(m_pDocument, SIGNAL(rebindCalledFor(bool)), this, SIGNAL(rebindCalledFor(bool)));
 	for (const char* const pName : {"SourceSegmentModel", "TargetSegmentModel"})
 		if (const QAbstractItemModel* const pModel = Model(pName))
@@ -414,6 +415,20 @@ QVariantMap VRetargetPanel::CompareWith(const QString& i_rPath)
 	QMetaObject::invokeMethod(m_pDocument, "CompareWith", Qt::DirectConnection, Q_RETURN_ARG(QVariantMap, review),
 	    Q_ARG(QUrl, QUrl::fromLocalFile(i_rPath)));
 	return review;
+}
+
+bool VRetargetPanel::Advise()
+{
+	ApplyTyped();
+	bool bAsked = false;
+	QMetaObject::invokeMethod(m_pDocument, "Advise", Qt::DirectConnection, Q_RETURN_ARG(bool, bAsked));
+	return bAsked;
+}
+
+void VRetargetPanel::RemoveJoint(int i_Segment)
+{
+	ApplyTyped();
+	QMetaObject::invokeMethod(m_pDocument, "RemoveJoint", Qt::DirectConnection, Q_ARG(int, i_Segment));
 }
 
 QVariantMap VRetargetPanel::Review(const char* i_pQuestion)

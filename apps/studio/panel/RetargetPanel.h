@@ -102,7 +102,10 @@ public:
 	void Rebind(bool i_bPerformer, bool i_bMeasure);
 	// The document's functions of these names.
 	QVariantMap CompareWith(const QString& i_rPath);
-	QVariantMap Advise() { return Review("Advise"); }
+	/// The answer comes by advised. False, with the reason told, if there is none to come.
+	bool Advise();
+	/// Of a segment of the character.
+	void RemoveJoint(int i_Segment);
 	QVariantMap CheckPose() { return Review("CheckPose"); }
 	/// By name.
 	QStringList SourceSegments() const { return SegmentsOf("SourceSegmentModel"); }
@@ -151,6 +154,9 @@ signals:
 
 	/// The character's file has other bones, or another performer was chosen.
 	void rebindCalledFor(bool i_bPerformer);
+
+	/// The document's signal of this name.
+	void advised(const QVariantMap& i_rReview);
 
 	/// The segments of performer or character may be others.
 	void segmentsChanged();

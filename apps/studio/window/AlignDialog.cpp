@@ -88,8 +88,12 @@ VAlignDialog::VAlignDialog(
 	m_pFeet->setToolTip(tr("Feet lean as the shins do, for a performer whose soles do: else they keep their tilt"));
 	connect(m_pFeet, &QCheckBox::toggled, this, &VAlignDialog::Align);
 	pChains->addWidget(m_pFeet);
-	m_pFitScale->setChecked(true);
-	connect(m_pFitScale, &QCheckBox::clicked, this, &VAlignDialog::Align);
+	connect(m_pFitScale, &QCheckBox::clicked, this,
+	    [this](bool i_bWanted)
+	    {
+		    m_bFitScale = i_bWanted;
+		    Align();
+	    });
 	auto* const pButtons = Named(
 	    new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel), "AlignButtons", tr("Keep or leave"));
 	Named(pButtons->button(QDialogButtonBox::Ok), "AlignKeep", tr("Keep this pose"))->setText(tr("&Keep This Pose"));
@@ -122,7 +126,7 @@ bool VAlignDialog::Align()
 	for (const int segment : m_Locked)
 		locked << segment;
 	m_bAtWork = true;
-	const QVariantMap aligned = m_rPanel.AlignToSource(chains, locked, m_pFitScale->isChecked(), m_pFeet->isChecked());
+	const QVariantMap aligned = m_rPanel.AlignToSource(chains, locked, m_bFitScale, m_pFeet->isChecked());
 	m_bAtWork = false;
 	const QVariantList joints = aligned["joints"].toList();
 	{
@@ -148,12 +152,15 @@ bool VAlignDialog::Align()
 void VAlignDialog::ShowScale(const QVariantMap& i_rAligned)
 {
 	const double scale = i_rAligned["scale"].toDouble();
+	const QString heights = i_rAligned["heights"].toString();
 	const bool bToFit = !i_rAligned.isEmpty() && scale != 1.0;
 	m_pFitScale->setEnabled(bToFit);
+	m_pFitScale->setChecked(bToFit && m_bFitScale);
 	m_pFitScale->setText(bToFit ? tr("S&cale the character by %1, so that its hips stand as high as the performer's")
 	                                  .arg(QLocale::c().toString(scale, 'g', 4))
-	                            : tr("S&cale the character: its hips stand as high as the performer's"));
-	m_pFitScale->setToolTip(PlainToolTip(i_rAligned["heights"].toString()));
+	        : heights.isEmpty() ? tr("Nothing to s&cale by: no hips are paired")
+	                            : tr("Nothing to s&cale: the hips stand as high as the performer's"));
+	m_pFitScale->setToolTip(PlainToolTip(heights));
 }
 
 void VAlignDialog::ShowJoint(int i_Row, const QVariantMap& i_rJoint)

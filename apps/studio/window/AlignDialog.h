@@ -51,8 +51,9 @@ private:
 	const QStringList m_Sources;
 	const QStringList m_Targets;
 	std::vector<QCheckBox*> m_Chains;
-	/// Whether the character is scaled to the performer; on at first.
+	/// Ticked where there is something to scale, and it is wanted.
 	QCheckBox* const m_pFitScale;
+	bool m_bFitScale = true;
 	QCheckBox* m_pFeet = nullptr;
 	/// Segments of the character that keep their joints.
 	std::set<int> m_Locked;

@@ -12,6 +12,7 @@
 #include <QHeaderView>
 #include <QLabel>
 #include <QPushButton>
+#include <QScrollBar>
 #include <QTreeWidget>
 #include <QVBoxLayout>
 
@@ -62,13 +63,18 @@ VReviewDialog::VReviewDialog(const VReview& i_rReview, VRetargetPanel& i_rPanel,
 		return pButton;
 	};
 	if (!i_rReview.m_Action.isEmpty())
-		add("ReviewAct", i_rReview.m_Action, i_rReview.m_Act);
+		m_pAct = add("ReviewAct", i_rReview.m_Action, &VReviewDialog::Act);
 	add("ReviewCopy", tr("C&opy"), &VReviewDialog::Copy)->setShortcut(QKeySequence::Copy);
-	add("ReviewAgain", tr("&Look Again"), &VReviewDialog::LookAgain);
+	m_pAgain = add("ReviewAgain", tr("&Look Again"), &VReviewDialog::LookAgain);
 	Named(pButtons->button(QDialogButtonBox::Close), "ReviewClose", tr("Close"));
 	connect(pButtons, &QDialogButtonBox::rejected, this, &QDialog::reject);
 	connect(&m_rPanel, &VRetargetPanel::stateChanged, this,
-	    [this] { m_pSummary->setText(tr("The target subject was edited or saved since: look again.")); });
+	    [this]
+	    {
+		    m_bEdited = true;
+		    if (!m_bAwaiting)
+			    m_pSummary->setText(tr("The target subject was edited or saved since: look again."));
+	    });
 	auto* const pLayout = new QVBoxLayout(this);
 	pLayout->addWidget(m_pSummary);
 	pLayout->addWidget(m_pRows, 1);
@@ -80,14 +86,34 @@ VReviewDialog::VReviewDialog(const VReview& i_rReview, VRetargetPanel& i_rPanel,
 
 bool VReviewDialog::Look()
 {
+	Await(true);
 	QApplication::setOverrideCursor(Qt::WaitCursor);
-	const QVariantMap review = m_Review.m_Look();
+	const bool bLooks = m_Review.m_Look(*this);
 	QApplication::restoreOverrideCursor();
-	if (review.isEmpty())
-		return false;
-	m_pSummary->setText(review["summary"].toString());
+	// What was being typed counts, too.
+	m_bEdited = false;
+	if (!bLooks)
+		Await(false);
+	return bLooks;
+}
+
+void VReviewDialog::Await(bool i_bAwaiting)
+{
+	m_bAwaiting = i_bAwaiting;
+	if (i_bAwaiting)
+		m_pSummary->setText(tr("Being found out..."));
+	m_pAgain->setEnabled(!i_bAwaiting);
+	ChooseRow();
+}
+
+void VReviewDialog::Show(const QVariantMap& i_rReview)
+{
+	m_pSummary->setText(i_rReview["summary"].toString()
+	    + (m_bAwaiting && m_bEdited ? ' ' + tr("The target subject was edited or saved meanwhile: look again.")
+	                                : QString()));
+	const int scrolled = m_pRows->verticalScrollBar()->value();
 	m_pRows->clear();
-	for (const QVariant& rRow : review["rows"].toList())
+	for (const QVariant& rRow : i_rReview["rows"].toList())
 	{
 		const QStringList cells = rRow.toMap()["cells"].toStringList();
 		auto* const pItem = new QTreeWidgetItem(m_pRows, cells);
@@ -100,8 +126,8 @@ bool VReviewDialog::Look()
 		m_pRows->resizeColumnToContents(column);
 		m_pRows->setColumnWidth(column, std::min(m_pRows->columnWidth(column), c_WidestColumn));
 	}
-	ChooseRow();
-	return true;
+	m_pRows->verticalScrollBar()->setValue(scrolled);
+	Await(false);
 }
 
 void VReviewDialog::LookAgain()
@@ -110,9 +136,18 @@ void VReviewDialog::LookAgain()
 		m_pSummary->setText(tr("There is nothing to look at any more: the log tells why."));
 }
 
+void VReviewDialog::Act()
+{
+	m_Review.m_Act(RowOf(m_pRows->currentItem()));
+	if (!m_Review.m_ActsOn.isEmpty())
+		LookAgain();
+}
+
 void VReviewDialog::ChooseRow()
 {
 	const QVariantMap row = RowOf(m_pRows->currentItem());
+	if (m_pAct)
+		m_pAct->setEnabled(m_Review.m_ActsOn.isEmpty() || (!m_bAwaiting && row.contains(m_Review.m_ActsOn)));
 	QStringList whole = row["cells"].toStringList();
 	whole.removeAll({});
 	m_pWhole->setText(whole.join(QStringLiteral(": ")));

@@ -8,6 +8,7 @@
 #include "studio/host/QtDispatcher.h"
 #include "studio/host/Services.h"
 #include "studio/motion/TakePlayer.h"
+#include "studio/window/ReviewDialog.h"
 #include "studio/window/StudioWindow.h"
 
 #include <QApplication>
@@ -17,6 +18,8 @@
 #include <QPixmap>
 #include <QQuickWidget>
 #include <QQuickWindow>
+
+#include <algorithm>
 
 namespace StudioHost
 {
@@ -52,8 +55,9 @@ void VScreenshot::OnDrawn()
 
 bool VScreenshot::AtRest() const
 {
-	return m_rWindow.Dispatcher().PendingCount() == 0 && m_rWindow.Gui().GetSkinCache()->Loading().empty()
-	    && m_rWindow.Motion().AtRest();
+	const auto dialogs = m_rWindow.findChildren<VReviewDialog*>();
+	return std::ranges::none_of(dialogs, &VReviewDialog::IsAwaiting) && m_rWindow.Dispatcher().PendingCount() == 0
+	    && m_rWindow.Gui().GetSkinCache()->Loading().empty() && m_rWindow.Motion().AtRest();
 }
 
 QPixmap VScreenshot::Picture() const

@@ -17,6 +17,18 @@
 
 namespace StudioHost
 {
+namespace
+{
+
+/// @param i_rReview empty if there is nothing to tell.
+bool ShowIn(VReviewDialog& io_rShown, const QVariantMap& i_rReview)
+{
+	if (!i_rReview.isEmpty())
+		io_rShown.Show(i_rReview);
+	return !i_rReview.isEmpty();
+}
+
+} // namespace
 
 void VStudioWindow::ShowReview(const VReview& i_rReview)
 {
@@ -48,7 +60,8 @@ void VStudioWindow::CompareWithSaved()
 void VStudioWindow::CompareWith(const QString& i_rPath)
 {
 	ShowReview({"Compare", tr("Compare with %1").arg(QFileInfo(i_rPath).fileName()), {tr("What differs")},
-	    [this, i_rPath] { return m_pRetargetPanel->CompareWith(i_rPath); }});
+	    [this, i_rPath](VReviewDialog& io_rShown)
+	    { return ShowIn(io_rShown, m_pRetargetPanel->CompareWith(i_rPath)); }});
 }
 
 void VStudioWindow::ShowAdvice()
@@ -56,14 +69,23 @@ void VStudioWindow::ShowAdvice()
 	if (m_pRetargetPanel)
 		ShowReview(
 		    {"Advice", tr("Advice"), {tr("Joint or target"), tr("Verdict"), tr("Bind pose without it"), tr("Why")},
-		        [this] { return m_pRetargetPanel->Advise(); }});
+		        [this](VReviewDialog& io_rShown)
+		        {
+			        connect(m_pRetargetPanel.get(), &VRetargetPanel::advised, &io_rShown, &VReviewDialog::Show,
+			            Qt::UniqueConnection);
+			        return m_pRetargetPanel->Advise();
+		        },
+		        tr("&Remove This Joint"),
+		        [this](const QVariantMap& i_rRow) { m_pRetargetPanel->RemoveJoint(i_rRow["joint"].toInt()); },
+		        QStringLiteral("joint")});
 }
 
 void VStudioWindow::ShowPoseCheck()
 {
 	if (m_pRetargetPanel)
 		ShowReview({"PoseCheck", tr("Check Pose"), {tr("What"), tr("Looks"), tr("How the two stand"), tr("Mended by")},
-		    [this] { return m_pRetargetPanel->CheckPose(); }, tr("&Align to Source..."), [this] { ShowAlignment(); }});
+		    [this](VReviewDialog& io_rShown) { return ShowIn(io_rShown, m_pRetargetPanel->CheckPose()); },
+		    tr("&Align to Source..."), [this](const QVariantMap&) { ShowAlignment(); }});
 }
 
 void VStudioWindow::WriteReport()

@@ -7,10 +7,6 @@
 
 namespace SetupIO
 {
-namespace
-{
-
-/// In single quotes where a shell would see more than a word.
 std::string ForShell(const std::string& i_rWord)
 {
 	static constexpr std::string_view c_Plain = "+,-./:=@_%";
@@ -28,8 +24,6 @@ std::string ForShell(const std::string& i_rWord)
 		text += byte == '\'' ? "'\\''" : std::string(1, byte);
 	return text + "'";
 }
-
-} // namespace
 
 std::string CommandText(const VSetup& i_rRecipe)
 {

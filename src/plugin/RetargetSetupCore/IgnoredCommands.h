@@ -14,6 +14,8 @@ inline constexpr const char* c_NoSource = "There is no source subject. Choose a 
 inline constexpr const char* c_NoTarget = "There is no target subject. Create one, or open a retarget subject file.";
 inline constexpr const char* c_NoSourceSegment = "No single segment of the source subject is selected.";
 inline constexpr const char* c_NoTargetSegment = "No single segment of the target subject is selected.";
+inline constexpr const char* c_NoJointToRemove =
+    "The target subject has no such segment with a joint that can go; the root's stays.";
 inline constexpr const char* c_NoSelectedTarget = "No single target is selected.";
 inline constexpr const char* c_SourceNoTree = "The segments of the source subject make no tree with joints.";
 inline constexpr const char* c_TargetNoTree = "The segments of the target subject make no tree with joints.";

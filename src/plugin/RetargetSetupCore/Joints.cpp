@@ -79,16 +79,22 @@ void EnableAllJoints(VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubject
 	shares.Restore(io_rSubject, io_rExtras);
 }
 
-void RemoveJointsWithoutTargets(VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras)
+std::vector<std::size_t> JointsWithoutTargets(const VSubjectParametrised& i_rSubject)
+{
+	std::vector<std::size_t> joints;
+	const std::vector<bool> used = SegmentsWithTargets(i_rSubject);
+	for (std::size_t i = 1; i < i_rSubject.m_Segments.size(); ++i)
+		if (!used[i] && i_rSubject.m_Segments[i].m_Joint.m_JointType != VJoint::EDummy)
+			joints.push_back(i);
+	return joints;
+}
+
+void RemoveJoints(VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras,
+    const std::vector<std::size_t>& i_rSegments)
 {
 	const VTPoseShares shares(io_rSubject, io_rExtras);
-	const std::vector<bool> used = SegmentsWithTargets(io_rSubject);
-	for (std::size_t i = 1; i < io_rSubject.m_Segments.size(); ++i)
-	{
-		VSubjectParametrised::VSegment& rSegment = io_rSubject.m_Segments[i];
-		if (!used[i] && rSegment.m_Joint.m_JointType != VJoint::EDummy)
-			RemoveJoint(rSegment);
-	}
+	for (const std::size_t segment : i_rSegments)
+		RemoveJoint(io_rSubject.m_Segments[segment]);
 	shares.Restore(io_rSubject, io_rExtras);
 }
 

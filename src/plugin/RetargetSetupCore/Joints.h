@@ -28,10 +28,12 @@ void RemoveJoint(CoreOrlexTypes::VSubjectParametrised::VSegment& io_rSegment);
 /// For each segment whether it carries a target of its own.
 std::vector<bool> SegmentsWithTargets(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
 
-/// Takes the joint from every segment, the root aside, that carries no target of its own; targets of its children do
-/// not count.
+/// Every segment, the root aside, with a joint and no target of its own; targets of its children do not count.
+std::vector<std::size_t> JointsWithoutTargets(const CoreOrlexTypes::VSubjectParametrised& i_rSubject);
+
+/// RemoveJoint for each of these segments.
 /// @param io_rExtras as above.
-void RemoveJointsWithoutTargets(
-    CoreOrlexTypes::VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras);
+void RemoveJoints(CoreOrlexTypes::VSubjectParametrised& io_rSubject, CoreOrlexQRTIO::VSubjectQRTExtras& io_rExtras,
+    const std::vector<std::size_t>& i_rSegments);
 
 } // namespace RetargetSetup

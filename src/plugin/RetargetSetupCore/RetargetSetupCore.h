@@ -133,6 +133,8 @@ public:
 	/// Takes the joints, but for the root's, from segments that carry no target; a Ball joint's pose goes into its
 	/// segment.
 	void RemoveUnnecessaryJoints();
+	/// The same to one segment, whether it carries a target or not.
+	void RemoveJoint(std::int32_t i_SegmentIndex);
 
 	/// Gives all segments the pose that their bones have in the FBX file, which must be the one that was read last. A
 	/// subject that is made stands so at once where the host's rules want it.
@@ -396,6 +398,10 @@ private:
 	/// Replaces the target subject at the end of a command, which is ignored if the host made no item.
 	bool ReplaceTarget(const char* i_pCommand, CoreOrlexTypes::VSubjectParametrised i_Parametrised,
 	    std::shared_ptr<const CoreOrlexTypes::VSubjectApplicationData> i_pApplicationData, VIdentities i_Identities);
+
+	/// @param i_rTarget whole; its segments with joints.
+	void RemoveJoints(const char* i_pCommand, const VSubjectValues& i_rTarget,
+	    const std::vector<std::size_t>& i_rSegments, const RetargetSetup::VEdit& i_rEdit);
 
 	/// Replace for the target subject.
 	/// @param i_Identities of the first targets; the others are new.

@@ -264,12 +264,35 @@ void VRetargetSetupCore::RemoveUnnecessaryJoints()
 	const VSubjectValues target = TargetValues();
 	if (!IsWhole(target))
 		return CommandIgnored(c_Command, Ignored::c_NoTarget);
-	VSubjectParametrised subject = *target.m_pParametrised;
+	RemoveJoints(c_Command, target, RetargetSetup::JointsWithoutTargets(*target.m_pParametrised),
+	    RetargetSetup::EditAs(Steps::c_RemoveJoints, "prune-joints"));
+}
+
+void VRetargetSetupCore::RemoveJoint(std::int32_t i_SegmentIndex)
+{
+	constexpr const char* c_Command = "RemoveJoint";
+	const VSubjectValues target = TargetValues();
+	if (!IsWhole(target))
+		return CommandIgnored(c_Command, Ignored::c_NoTarget);
+	const auto segment = std::size_t(i_SegmentIndex);
+	if (i_SegmentIndex < 1 || segment >= target.m_pParametrised->m_Segments.size()
+	    || target.m_pParametrised->m_Segments[segment].m_Joint.m_JointType == VSubjectParametrised::VJoint::EDummy)
+		return CommandIgnored(c_Command, Ignored::c_NoJointToRemove);
+	RemoveJoints(c_Command, target, {segment},
+	    RetargetSetup::EditAs(
+	        Steps::c_RemoveJoint, "prune-joint", RetargetSetup::WordOf(segment, *target.m_pParametrised)));
+}
+
+void VRetargetSetupCore::RemoveJoints(const char* i_pCommand, const VSubjectValues& i_rTarget,
+    const std::vector<std::size_t>& i_rSegments, const RetargetSetup::VEdit& i_rEdit)
+{
+	VSubjectParametrised subject = *i_rTarget.m_pParametrised;
 	CoreOrlexQRTIO::VSubjectQRTExtras extras = GetTargetExtras();
-	RetargetSetup::RemoveJointsWithoutTargets(subject, extras);
-	if (const auto pBefore = RetargetSetup::KinematicsInBindPose(*target.m_pParametrised, *target.m_pSubject, "target"))
+	RetargetSetup::RemoveJoints(subject, extras, i_rSegments);
+	if (const auto pBefore =
+	        RetargetSetup::KinematicsInBindPose(*i_rTarget.m_pParametrised, *i_rTarget.m_pSubject, "target"))
 		TellChangedPose(*pBefore, subject);
-	const VStep step(*this, RetargetSetup::EditAs(Steps::c_RemoveJoints, "prune-joints"));
-	if (ReplaceTarget(c_Command, std::move(subject), target.m_pApplicationData, m_Target.m_Identities))
+	const VStep step(*this, i_rEdit);
+	if (ReplaceTarget(i_pCommand, std::move(subject), i_rTarget.m_pApplicationData, m_Target.m_Identities))
 		TakeExtras(std::move(extras));
 }

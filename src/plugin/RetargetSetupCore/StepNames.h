@@ -14,6 +14,7 @@ inline constexpr const char* c_Align = "Align to Source";
 inline constexpr const char* c_RemoveTarget = "Remove Target";
 inline constexpr const char* c_UpdateTargets = "Update Targets";
 inline constexpr const char* c_CreateAllJoints = "Create All Joints";
+inline constexpr const char* c_RemoveJoint = "Remove Joint";
 inline constexpr const char* c_RemoveJoints = "Remove Unnecessary Joints";
 inline constexpr const char* c_MatchFilePose = "Take Pose from FBX";
 inline constexpr const char* c_Rebind = "Re-bind";

@@ -10,6 +10,7 @@
 #include <QVariant>
 
 #include <memory>
+#include <thread>
 #include <vector>
 
 namespace SetupProposal
@@ -49,6 +50,7 @@ public:
 	Q_INVOKABLE void RemoveTarget(int i_TargetIndex) { VRetargetSetupCore::RemoveTarget(i_TargetIndex); }
 	Q_INVOKABLE void CreateAllJoints() { VRetargetSetupCore::CreateAllJoints(); }
 	Q_INVOKABLE void RemoveUnnecessaryJoints() { VRetargetSetupCore::RemoveUnnecessaryJoints(); }
+	Q_INVOKABLE void RemoveJoint(int i_SegmentIndex) { VRetargetSetupCore::RemoveJoint(i_SegmentIndex); }
 	Q_INVOKABLE void MatchFilePose() { VRetargetSetupCore::MatchFilePose(); }
 	Q_INVOKABLE void UpdateTargets() { VRetargetSetupCore::UpdateTargets(); }
 	Q_INVOKABLE bool HasUnsavedChanges() const { return VRetargetSetupCore::HasUnsavedChanges(); }
@@ -106,8 +108,10 @@ public:
 	Q_INVOKABLE QVariantMap CompareWith(const QUrl& i_rFileURL);
 	/// Which joints could go, and which targets pull against each other while the source goes through its range. The
 	/// skin is that of the FBX file that was read last, if the target subject was made of it. Cells: joint or target,
-	/// verdict, what the bind pose would be without the joint, why.
-	Q_INVOKABLE QVariantMap Advise();
+	/// verdict, what the bind pose would be without the joint, why. Rows of joints have "joint", the segment's index.
+	/// It is found out on a thread beside, and told by advised; what is asked for last counts.
+	/// @return false, with the reason told by commandIgnored, if there is nothing to tell.
+	Q_INVOKABLE bool Advise();
 	/// How source and target subject differ as they stand at rest. Cells: what, "fine" or "look", a sentence with the
 	/// numbers, what mends it.
 	Q_INVOKABLE QVariantMap CheckPose();
@@ -165,6 +169,9 @@ signals:
 	/// AddTarget has found the target that it was to add.
 	void targetFound(int i_TargetIndex);
 
+	/// What Advise has found out, of the subjects as they stood then.
+	void advised(const QVariantMap& i_rReview);
+
 	/// A command has ended with no change.
 	/// @param i_rCommand the name of the invokable.
 	/// @param i_rReason a sentence for the operator: what was missing, or what failed.
@@ -197,4 +204,9 @@ private:
 	/// Set by nothing and read by nothing, as is the spare flag.
 	QMatrix4x4 m_SpareMatrix;
 	[[maybe_unused]] bool m_bSpare = false;
+	bool m_bAdvising = false;
+	/// It was asked once more since.
+	bool m_bAdviseAgain = false;
+	/// Last: it uses others.
+	std::jthread m_Advising;
 };

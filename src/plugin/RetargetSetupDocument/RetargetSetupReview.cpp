@@ -9,12 +9,52 @@
 
 #include <QStringList>
 
+#include <utility>
+
 namespace
 {
 
 QVariantMap Row(const QStringList& i_rCells, const QString& i_rAbout)
 {
 	return {{"cells", i_rCells}, {"about", i_rAbout}};
+}
+
+QVariantMap AdviceOn(const VRetargetSetupCore::VSubjectValues& i_rSource,
+    const VRetargetSetupCore::VSubjectValues& i_rTarget, const boost::filesystem::path& i_rFbx)
+{
+	auto advice = SetupReview::AdviceOn(i_rSource, i_rTarget, i_rFbx);
+	if (!advice)
+		advice = SetupReview::AdviceOn(i_rSource, i_rTarget, {});
+	QVariantList rows;
+	for (const SetupReview::VPruneAdvice& rAdvice : advice->m_Prune)
+	{
+		const QString joint = QString::fromStdString(i_rTarget.m_pParametrised->m_Segments[rAdvice.m_Segment].m_Name);
+		QVariantMap row =
+		    Row({joint, SetupReview::NameOf(rAdvice.m_Verdict),
+		            QString::fromStdString(SetupReview::PoseChangeText(rAdvice, *i_rTarget.m_pParametrised)),
+		            QString::fromStdString(rAdvice.m_Words)},
+		        '"' + joint + '"');
+		row["joint"] = int(rAdvice.m_Segment);
+		rows << row;
+	}
+	QString summary = rows.isEmpty() ? QStringLiteral("Every joint carries a target.")
+	                                 : QString("Joints without a target of their own: %1.").arg(rows.size());
+	if (!advice->m_bSkin && !rows.isEmpty())
+		summary += QStringLiteral(" Which must stay for the skin is not known: the character's FBX file is not open.");
+	if (!advice->m_Range)
+		return {{"summary", summary + QStringLiteral(" Without a source skeleton there is no range of motion.")},
+		    {"rows", rows}};
+	for (const SetupReview::VRangeConflict& rConflict : advice->m_Range->m_Conflicts)
+	{
+		const QString missed = "target " + QString::fromStdString(rConflict.m_TargetName);
+		rows << Row(
+		    {missed, QStringLiteral("is pulled"), {},
+		        QString("target %1 pulls against it: it %2")
+		            .arg(QString::fromStdString(rConflict.m_AgainstName), QString::fromStdString(rConflict.m_Words))},
+		    missed);
+	}
+	return {{"summary", summary + ' ' + QString::fromStdString(SetupReview::RangeSummary(*advice->m_Range)) + '.'},
+	    {"rows", rows}};
 }
 
 } // namespace
@@ -44,45 +84,34 @@ QVariantMap VRetargetSetup::CompareWith(const QUrl& i_rFileURL)
 	    {"rows", rows}};
 }
 
-QVariantMap VRetargetSetup::Advise()
+bool VRetargetSetup::Advise()
 {
 	const VSubjectValues target = TargetValues();
-	if (!target.m_pParametrised || !target.m_pApplicationData)
+	if (!target.m_pParametrised || !target.m_pApplicationData || !target.m_pSubject)
 	{
 		CommandIgnored("Advise", RetargetSetup::Ignored::c_NoTarget);
-		return {};
+		return false;
+	}
+	if (std::exchange(m_bAdvising, true))
+	{
+		m_bAdviseAgain = true;
+		return true;
 	}
 	const bool bItsFile = target.m_pApplicationData->m_Skin == GetTargetName() && !GetTargetFBXPath().empty();
-	auto advice = SetupReview::AdviceOn(*this, bItsFile ? GetTargetFBXPath() : boost::filesystem::path());
-	if (!advice)
-		advice = SetupReview::AdviceOn(*this, {});
-	QVariantList rows;
-	for (const SetupReview::VPruneAdvice& rAdvice : advice->m_Prune)
-	{
-		const QString joint = QString::fromStdString(target.m_pParametrised->m_Segments[rAdvice.m_Segment].m_Name);
-		rows << Row({joint, SetupReview::NameOf(rAdvice.m_Verdict),
-		                QString::fromStdString(SetupReview::PoseChangeText(rAdvice, *target.m_pParametrised)),
-		                QString::fromStdString(rAdvice.m_Words)},
-		    '"' + joint + '"');
-	}
-	QString summary = rows.isEmpty() ? QStringLiteral("Every joint carries a target.")
-	                                 : QString("Joints without a target of their own: %1.").arg(rows.size());
-	if (!advice->m_bSkin && !rows.isEmpty())
-		summary += QStringLiteral(" Which must stay for the skin is not known: the character's FBX file is not open.");
-	if (!advice->m_Range)
-		return {{"summary", summary + QStringLiteral(" Without a source skeleton there is no range of motion.")},
-		    {"rows", rows}};
-	for (const SetupReview::VRangeConflict& rConflict : advice->m_Range->m_Conflicts)
-	{
-		const QString missed = "target " + QString::fromStdString(rConflict.m_TargetName);
-		rows << Row(
-		    {missed, QStringLiteral("is pulled"), {},
-		        QString("target %1 pulls against it: it %2")
-		            .arg(QString::fromStdString(rConflict.m_AgainstName), QString::fromStdString(rConflict.m_Words))},
-		    missed);
-	}
-	return {{"summary", summary + ' ' + QString::fromStdString(SetupReview::RangeSummary(*advice->m_Range)) + '.'},
-	    {"rows", rows}};
+	m_Advising = std::jthread(
+	    [this, source = SourceValues(), target, fbx = bItsFile ? GetTargetFBXPath() : boost::filesystem::path()]
+	    {
+		    QMetaObject::invokeMethod(
+		        this,
+		        [this, advice = AdviceOn(source, target, fbx)]
+		        {
+			        m_bAdvising = false;
+			        if (!std::exchange(m_bAdviseAgain, false) || !Advise())
+				        emit advised(advice);
+		        },
+		        Qt::QueuedConnection);
+	    });
+	return true;
 }
 
 std::vector<SetupProposal::VPoseFinding> VRetargetSetup::PoseFindings(const SetupProposal::VProposal& i_rProposal) const

@@ -9,11 +9,10 @@
 namespace SetupReview
 {
 
-std::optional<VAdvice> AdviceOn(const VRetargetSetupCore& i_rDocument, const boost::filesystem::path& i_rFbx)
+std::optional<VAdvice> AdviceOn(const VRetargetSetupCore::VSubjectValues& i_rSource,
+    const VRetargetSetupCore::VSubjectValues& i_rTarget, const boost::filesystem::path& i_rFbx)
 {
 	VAdvice advice;
-	const auto source = i_rDocument.SourceValues();
-	const auto target = i_rDocument.TargetValues();
 	std::vector<std::size_t> vertices;
 	if (!i_rFbx.empty())
 	{
@@ -23,12 +22,12 @@ std::optional<VAdvice> AdviceOn(const VRetargetSetupCore& i_rDocument, const boo
 			return std::nullopt;
 		FBXIO::VSkin skin;
 		reader.ReadSkin(skin);
-		vertices = SkinVertices(*target.m_pParametrised, skin);
+		vertices = SkinVertices(*i_rTarget.m_pParametrised, skin);
 		advice.m_bSkin = !skin.m_Meshes.empty();
 	}
-	advice.m_Prune = AdvisePruning(*target.m_pParametrised, vertices);
-	if (source.m_pParametrised)
-		advice.m_Range = GoThroughRange(source, target);
+	advice.m_Prune = AdvisePruning(*i_rTarget.m_pParametrised, vertices);
+	if (i_rSource.m_pParametrised)
+		advice.m_Range = GoThroughRange(i_rSource, i_rTarget);
 	return advice;
 }
 

@@ -22,10 +22,13 @@ struct VAdvice
 	bool m_bSkin = false;
 };
 
-/// Of the document's target subject, which there is, and its source if it has one.
+/// On any thread.
+/// @param i_rSource what the target subject follows, may be empty.
+/// @param i_rTarget whole.
 /// @param i_rFbx the character's file, for the skin; empty for none.
 /// @return nothing if that cannot be read whole.
-std::optional<VAdvice> AdviceOn(const VRetargetSetupCore& i_rDocument, const boost::filesystem::path& i_rFbx);
+std::optional<VAdvice> AdviceOn(const VRetargetSetupCore::VSubjectValues& i_rSource,
+    const VRetargetSetupCore::VSubjectValues& i_rTarget, const boost::filesystem::path& i_rFbx);
 
 /// "tail3 by 12.0 mm and 3.0 degrees", or that it stays.
 std::string PoseChangeText(const VPruneAdvice& i_rAdvice, const CoreOrlexTypes::VSubjectParametrised& i_rSubject);

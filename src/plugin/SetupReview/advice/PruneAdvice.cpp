@@ -3,7 +3,9 @@
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 #include "CoreOrlexTypesUtils/convert/SubjectParametrisedConverter.h"
 #include "RetargetSetupCore/Joints.h"
+#include "RetargetSetupCore/SessionSteps.h"
 #include "RetargetSetupCore/TargetConstruction.h"
+#include "SetupIO/CommandText.h"
 
 #include <unordered_map>
 
@@ -124,6 +126,8 @@ std::vector<VPruneAdvice> AdvisePruning(
 			pruned.m_Segments[i] = i_rSubject.m_Segments[i];
 		}
 		rAdvice.m_Words = WordsFor(rAdvice, !i_rVertices.empty());
+		if (rAdvice.m_Verdict != EPruneVerdict::Stay)
+			rAdvice.m_Options = "--prune-joint " + SetupIO::ForShell(RetargetSetup::WordOf(i, i_rSubject));
 	}
 	return advice;
 }

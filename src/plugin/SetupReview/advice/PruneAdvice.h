@@ -41,6 +41,8 @@ struct VPruneAdvice
 	bool m_bPoseKnown = true;
 	/// A sentence for the operator.
 	std::string m_Words;
+	/// Those of "retarget edit" that remove it, for a shell; empty where it is to stay.
+	std::string m_Options;
 };
 
 /// For each segment how many vertices are weighted to the bone of its name.
