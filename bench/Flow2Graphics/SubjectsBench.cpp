@@ -48,6 +48,8 @@ CoreOrlexTypes::VSubject MakeSubject(std::uint32_t i_Segments)
 		target.m_State = {0.1, 0.2, 0.3};
 		subject.m_Targets.push_back(target);
 	}
+	subject.m_Markers.resize((i_Segments + 1) / 2);
+	subject.m_Rotations.resize(i_Segments / 2);
 	return subject;
 }
 

@@ -59,6 +59,8 @@ constexpr VPair c_Catalogue[] = {{"General2D", "UniformColour", false}, {"Simple
     {"Simple3DModelColour", "SimpleLighting", true}, {"NonUniformSphere", "Covariance", false},
     {"MissingMarker", "MissingMarker", false}, {"Stick", "Colour", true}, {"Sphere", "SimpleLighting", true},
     {"Point3D", "Colour", false}, {"FBXSkin", "FBXMaterial", true}, {"FBXSkin", "XRay", false},
+    {"Placed", "SimpleLighting", false}, {"Placed", "Segment", false}, {"Placed", "Covariance", false},
+    {"Placed", "MissingMarker", false}, {"Placed", "Colour", false},
     // Kept for other scenes: each with a partner that it suits.
     {"Billboard", "ActiveLabelHalo", false}, {"CameraRay", "ClipFloor", false},
     {"FBXColoredMesh", "CameraCoverageFurstum", false}, {"ColoredLine", "StippledLine", false},

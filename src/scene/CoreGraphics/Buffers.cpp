@@ -69,12 +69,24 @@ void VStaticBuffer::Bind()
 		m_pObject->Fill(m_Bytes.data(), m_Bytes.size());
 }
 
-VStreamBuffer::VStreamBuffer() : m_pObject(std::make_unique<VObject>(QOpenGLBuffer::VertexBuffer)) {}
+VStreamBuffer::VStreamBuffer(EStream i_Stream)
+    : m_pObject(std::make_unique<VObject>(
+        i_Stream == EStreamVertices ? QOpenGLBuffer::VertexBuffer : QOpenGLBuffer::IndexBuffer))
+{
+}
+
+VStreamBuffer::VStreamBuffer(VStreamBuffer&&) noexcept = default;
+VStreamBuffer& VStreamBuffer::operator=(VStreamBuffer&&) noexcept = default;
 VStreamBuffer::~VStreamBuffer() = default;
+
+bool VStreamBuffer::Bind()
+{
+	return m_pObject->Bind(QOpenGLBuffer::StreamDraw);
+}
 
 void VStreamBuffer::Upload(const void* i_pBytes, std::size_t i_Size)
 {
-	m_pObject->Bind(QOpenGLBuffer::StreamDraw);
+	Bind();
 	m_pObject->Fill(i_pBytes, i_Size);
 }
 

@@ -41,14 +41,26 @@ private:
 	std::unique_ptr<VObject> m_pObject;
 };
 
-/// Vertices that are others in each frame.
+/// What a stream buffer holds.
+enum EStream : std::uint32_t
+{
+	EStreamVertices,
+	EStreamIndices
+};
+
+/// Vertices that are others in each frame, or their order.
 class VStreamBuffer
 {
 public:
-	VStreamBuffer();
+	explicit VStreamBuffer(EStream i_Stream = EStreamVertices);
+	VStreamBuffer(VStreamBuffer&&) noexcept;
+	VStreamBuffer& operator=(VStreamBuffer&&) noexcept;
 	~VStreamBuffer();
 
-	/// Binds the buffer with these bytes in it. Needs the context to be current.
+	/// @return true if nothing is in it: at first, and in another share group. Needs the context to be current, as does
+	/// the next one.
+	bool Bind();
+	/// Binds the buffer with these bytes in it.
 	void Upload(const void* i_pBytes, std::size_t i_Size);
 
 private:

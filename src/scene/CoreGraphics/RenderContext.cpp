@@ -172,7 +172,7 @@ void VRenderContext::SetUniform(VUniform& io_rUniform, const float* i_pMatrices,
 		m_pFunctions->glUniformMatrix4fv(location, static_cast<GLsizei>(i_Count), GL_FALSE, i_pMatrices);
 }
 
-void VRenderContext::SetVertexFormat(const VVertexFormat& i_rFormat)
+void VRenderContext::SetVertexFormat(const VVertexFormat& i_rFormat, std::size_t i_First)
 {
 	std::bitset<c_AttributeArrays> enabled;
 	for (const VVertexFormat::VEntry& rEntry : i_rFormat.m_Entries)
@@ -183,7 +183,7 @@ void VRenderContext::SetVertexFormat(const VVertexFormat& i_rFormat)
 		enabled.set(static_cast<std::size_t>(location));
 		m_pFunctions->glVertexAttribPointer(static_cast<GLuint>(location), rEntry.m_Components, rEntry.m_Type,
 		    rEntry.m_Normalised ? GL_TRUE : GL_FALSE, static_cast<GLsizei>(i_rFormat.m_Stride),
-		    reinterpret_cast<const void*>(std::uintptr_t{rEntry.m_Offset}));
+		    reinterpret_cast<const void*>(i_First * i_rFormat.m_Stride + rEntry.m_Offset));
 	}
 	const std::bitset<c_AttributeArrays> changed = enabled ^ m_EnabledAttributes;
 	for (std::size_t array = 0; changed.any() && array < c_AttributeArrays; ++array)
@@ -253,6 +253,12 @@ void VRenderContext::DrawElements(unsigned int i_Mode, VIndexBuffer& io_rIndices
 {
 	io_rIndices.Bind();
 	m_pFunctions->glDrawElements(i_Mode, static_cast<GLsizei>(io_rIndices.Count()), io_rIndices.Type(), nullptr);
+}
+
+void VRenderContext::DrawElements(unsigned int i_Mode, std::size_t i_First, std::size_t i_Count)
+{
+	m_pFunctions->glDrawElements(i_Mode, static_cast<GLsizei>(i_Count), GL_UNSIGNED_SHORT,
+	    reinterpret_cast<const void*>(i_First * sizeof(std::uint16_t)));
 }
 
 void VRenderContext::SetClearColour(const QColor& i_rColour)

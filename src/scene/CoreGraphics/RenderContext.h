@@ -131,7 +131,8 @@ public:
 	void SetUniform(VUniform& io_rUniform, const float* i_pMatrices, std::size_t i_Count);
 
 	/// Of the vertex buffer that is bound, for the program in use.
-	void SetVertexFormat(const VVertexFormat& i_rFormat);
+	/// @param i_First the vertex of the buffer that counts as the first
+	void SetVertexFormat(const VVertexFormat& i_rFormat, std::size_t i_First = 0);
 	/// Binds the buffer, and sets its format.
 	void BindVertices(VVertexBuffer& io_rBuffer);
 	void ApplyState(const VRenderState& i_rState);
@@ -139,6 +140,8 @@ public:
 	/// @param i_Mode GL_TRIANGLES, GL_LINES...
 	void DrawArrays(unsigned int i_Mode, std::size_t i_Count);
 	void DrawElements(unsigned int i_Mode, VIndexBuffer& io_rIndices);
+	/// Of the indices that are bound, two bytes each.
+	void DrawElements(unsigned int i_Mode, std::size_t i_First, std::size_t i_Count);
 
 	/// For ClearBuffers.
 	void SetClearColour(const QColor& i_rColour);

@@ -100,10 +100,10 @@ const OrlexGraphics::VSubjectOptions& SubjectOptions(
 	}
 }
 
-VRenderSubjectDynamics::VStep::VStep(CoreGraphics::VShaderLibrary& io_rLibrary, const std::string& i_rVertex,
-    const std::string& i_rFragment, const VRenderState& i_rState, const char* i_pPlace, const char* i_pColour)
-    : m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, i_rVertex, i_rFragment)), m_State(i_rState),
-      m_SelectionState(CoreGraphics::MakeSelectionState(i_rState)), m_Place(i_pPlace), m_Colour(i_pColour)
+VRenderSubjectDynamics::VStep::VStep(CoreGraphics::VShaderLibrary& io_rLibrary, const std::string& i_rFragment,
+    const VRenderState& i_rState, unsigned int i_Mode)
+    : m_pProgram(io_rLibrary.GetProgram("Placed", i_rFragment)), m_State(i_rState),
+      m_SelectionState(CoreGraphics::MakeSelectionState(i_rState)), m_Mode(i_Mode)
 {
 }
 
@@ -115,14 +115,14 @@ VRenderSubjectDynamics::VRenderSubjectDynamics(CoreGraphics::VShaderLibrary& io_
       m_WireBox(CoreGraphics::MakeBox(true)), m_ArrowShapes{MakeArrow(c_ArrowSides), MakeArrow(c_ThinArrowSides)},
       m_Sphere(CoreGraphics::MakeSphere(2)), m_AxesLines(CoreGraphics::MakeAxes(c_AxesLength)),
       m_Bone(OrlexGraphics::ReadMeshFile(io_rLibrary, "tetra_stripe.fbx")),
-      m_PositionTargets(io_rLibrary, "Target", "Colour", Blended(), "u_TargetPosAndSize", "u_ModelColour"),
-      m_Covariances(io_rLibrary, "NonUniformSphere", "Covariance", Blended(), "u_ModelTransform", "u_ModelColour"),
-      m_Boxes(io_rLibrary, "Simple3DModelColour", "SimpleLighting", Blended(), "u_ModelTransform", "u_ModelColour"),
-      m_Bones(io_rLibrary, "Segment", "Segment", Solid(), "u_ModelTransform", "u_SegmentColour"),
-      m_TranslucentBones(io_rLibrary, "Segment", "Segment", Blended(), "u_ModelTransform", "u_SegmentColour"),
-      m_Arrows(io_rLibrary, "Simple3DModelColour", "SimpleLighting", Solid(), "u_ModelTransform", "u_ModelColour"),
-      m_MissingMarkers(io_rLibrary, "MissingMarker", "MissingMarker", Fading(), "u_ReconPosAndSize", "u_ModelColour"),
-      m_Axes(io_rLibrary, "Simple3DModelWireframe", "Colour", Lines(), "u_ModelTransform", "u_ModelColour"),
+      m_PositionTargets(io_rLibrary, "Colour", Blended(), GL_LINES),
+      m_Covariances(io_rLibrary, "Covariance", Blended(), GL_TRIANGLES),
+      m_Boxes(io_rLibrary, "SimpleLighting", Blended(), GL_TRIANGLES),
+      m_Bones(io_rLibrary, "Segment", Solid(), GL_TRIANGLES),
+      m_TranslucentBones(io_rLibrary, "Segment", Blended(), GL_TRIANGLES),
+      m_Arrows(io_rLibrary, "SimpleLighting", Solid(), GL_TRIANGLES),
+      m_MissingMarkers(io_rLibrary, "MissingMarker", Fading(), GL_TRIANGLES),
+      m_Axes(io_rLibrary, "Colour", Lines(), GL_LINES), m_pIds(io_rLibrary.GetProgram("Placed", "Colour")),
       m_ArrowParts(MakeArrowParts())
 {
 }
@@ -141,7 +141,7 @@ void VRenderSubjectDynamics::Render(
 	{
 		const OrlexGraphics::VSubjectOptions& rOptions = SubjectOptions(i_rOptions, rTypes.m_Class);
 		if (rOptions.m_bEnabled && !m_Lists[rTypes.m_Class].empty())
-			RenderList({io_rContext, m_Lists[rTypes.m_Class], rOptions, i_Pass, bDual,
+			RenderList({io_rContext, rTypes.m_Class, m_Lists[rTypes.m_Class], rOptions, i_Pass, bDual,
 			    io_rContext.m_Mode != CoreGraphics::ERenderNormal});
 	}
 }
@@ -171,89 +171,82 @@ void VRenderSubjectDynamics::RenderList(const VWalk& i_rWalk)
 		RenderAxes(i_rWalk);
 }
 
-bool VRenderSubjectDynamics::Begin(const VWalk& i_rWalk, VStep& io_rStep, CoreGraphics::VShape& io_rShape)
+CoreGraphics::VShapeBatch& VRenderSubjectDynamics::BatchOf(const VWalk& i_rWalk, VStep& io_rStep)
 {
-	if (!i_rWalk.m_rContext.UseProgram(io_rStep.m_Program.Get(i_rWalk.m_bPick)))
-		return false;
-	i_rWalk.m_rContext.ApplyState(i_rWalk.m_bPick ? io_rStep.m_SelectionState : io_rStep.m_State);
-	i_rWalk.m_rContext.BindVertices(io_rShape.m_Vertices);
-	return true;
+	return i_rWalk.m_bPick ? m_IdBatch : io_rStep.m_Batches[i_rWalk.m_Class][i_rWalk.m_Pass];
 }
 
 template <typename TPlace>
-bool VRenderSubjectDynamics::Place(const VWalk& i_rWalk, VStep& io_rStep, const TPlace& i_rPlace,
-    const QVector4D& i_rColour, const CoreGraphics::VSelectionId& i_rId)
+bool VRenderSubjectDynamics::Gather(const VWalk& i_rWalk, VStep& io_rStep, const CoreGraphics::VShape& i_rShape,
+    const TPlace& i_rPlace, const QVector4D& i_rColour, const CoreGraphics::VSelectionId& i_rId)
 {
-	if (i_rWalk.m_bPick)
-	{
-		if (i_rId.m_Id == 0 || m_pRegistry->IsHidden(i_rId, i_rWalk.m_rContext.m_Mode))
-			return false;
-		io_rStep.m_Program.SetId(i_rWalk.m_rContext, i_rId);
-	}
-	else
-		i_rWalk.m_rContext.SetUniform(io_rStep.m_Colour, i_rColour);
-	i_rWalk.m_rContext.SetUniform(io_rStep.m_Place, i_rPlace);
+	if (i_rWalk.m_bPick && (i_rId.m_Id == 0 || m_pRegistry->IsHidden(i_rId, i_rWalk.m_rContext.m_Mode)))
+		return false;
+	BatchOf(i_rWalk, io_rStep)
+	    .Add(i_rShape, i_rPlace,
+	        i_rWalk.m_bPick ? CoreGraphics::ColourBytes(i_rId) : CoreGraphics::ColourBytes(i_rColour));
 	return true;
+}
+
+void VRenderSubjectDynamics::Draw(const VWalk& i_rWalk, VStep& io_rStep)
+{
+	CoreGraphics::VShapeBatch& rBatch = BatchOf(i_rWalk, io_rStep);
+	if (!rBatch.IsEmpty() && i_rWalk.m_rContext.UseProgram(i_rWalk.m_bPick ? m_pIds : io_rStep.m_pProgram))
+	{
+		i_rWalk.m_rContext.ApplyState(i_rWalk.m_bPick ? io_rStep.m_SelectionState : io_rStep.m_State);
+		rBatch.Draw(i_rWalk.m_rContext, io_rStep.m_Mode);
+	}
+	rBatch.Clear();
 }
 
 void VRenderSubjectDynamics::RenderPositionTargets(const VWalk& i_rWalk)
 {
-	if (!Begin(i_rWalk, m_PositionTargets, m_WireBox))
-		return;
 	for (const auto& rpSubject : i_rWalk.m_rSubjects)
 		for (const VRenderSubjectData::VShape& rTarget : rpSubject->m_PositionTargets)
-		{
-			if (!Place(i_rWalk, m_PositionTargets, rTarget.m_PositionAndSize, rTarget.m_Colour, rTarget.m_Id))
-				continue;
-			i_rWalk.m_rContext.DrawElements(GL_LINES, m_WireBox.m_Indices);
-			m_pSphereHelper->AddPickPoint(i_rWalk.m_rContext, rTarget.m_PositionAndSize.toVector3D(), rTarget.m_Id);
-		}
+			if (Gather(
+			        i_rWalk, m_PositionTargets, m_WireBox, rTarget.m_PositionAndSize, rTarget.m_Colour, rTarget.m_Id))
+				m_pSphereHelper->AddPickPoint(i_rWalk.m_rContext, rTarget.m_PositionAndSize.toVector3D(), rTarget.m_Id);
+	Draw(i_rWalk, m_PositionTargets);
 }
 
 void VRenderSubjectDynamics::RenderCovariances(const VWalk& i_rWalk)
 {
-	if (!Begin(i_rWalk, m_Covariances, m_Sphere))
-		return;
 	for (const auto& rpSubject : i_rWalk.m_rSubjects)
 		for (const QMatrix4x4& rCovariance : rpSubject->m_Covariances)
-		{
-			Place(i_rWalk, m_Covariances, rCovariance, c_CovarianceColour, {});
-			i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, m_Sphere.m_Indices);
-		}
+			Gather(i_rWalk, m_Covariances, m_Sphere, rCovariance, c_CovarianceColour, {});
+	Draw(i_rWalk, m_Covariances);
 }
 
 void VRenderSubjectDynamics::RenderBoxes(const VWalk& i_rWalk)
 {
 	const bool bTransparent = i_rWalk.m_Pass == OrlexGraphics::EPassTransparent;
-	if ((i_rWalk.m_bPick && bTransparent) || !Begin(i_rWalk, m_Boxes, m_SolidBox))
+	if (i_rWalk.m_bPick && bTransparent)
 		return;
 	for (const auto& rpSubject : i_rWalk.m_rSubjects)
 		for (const VRenderSubjectData::VModel& rBox : rpSubject->m_Boxes)
 		{
 			if (!i_rWalk.m_bPick && bTransparent != (rBox.m_Colour.w() != 1.0f))
 				continue;
-			if (!Place(i_rWalk, m_Boxes, rBox.m_Matrix, rBox.m_Colour, rBox.m_Id))
-				continue;
-			i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, m_SolidBox.m_Indices);
-			m_pSphereHelper->AddPickPoint(i_rWalk.m_rContext, Translation(rBox.m_Matrix), rBox.m_Id);
+			if (Gather(i_rWalk, m_Boxes, m_SolidBox, rBox.m_Matrix, rBox.m_Colour, rBox.m_Id))
+				m_pSphereHelper->AddPickPoint(i_rWalk.m_rContext, Translation(rBox.m_Matrix), rBox.m_Id);
 		}
+	Draw(i_rWalk, m_Boxes);
 }
 
 void VRenderSubjectDynamics::RenderBones(const VWalk& i_rWalk)
 {
-	VStep& rStep = i_rWalk.m_bDual ? m_TranslucentBones : m_Bones;
-	if (!m_Bone || !Begin(i_rWalk, rStep, *m_Bone))
+	if (!m_Bone)
 		return;
+	VStep& rStep = i_rWalk.m_bDual ? m_TranslucentBones : m_Bones;
 	const bool bTransparent = i_rWalk.m_Pass == OrlexGraphics::EPassTransparent;
 	for (const auto& rpSubject : i_rWalk.m_rSubjects)
 		for (const VRenderSubjectData::VModel& rBone : rpSubject->m_Bones)
 		{
 			const bool bTranslucent = i_rWalk.m_bDual && rBone.m_Colour.w() < 1.0f;
-			if (!i_rWalk.m_bPick && bTransparent != bTranslucent)
-				continue;
-			if (Place(i_rWalk, rStep, rBone.m_Matrix, rBone.m_Colour, rBone.m_Id))
-				i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, m_Bone->m_Indices);
+			if (i_rWalk.m_bPick || bTransparent == bTranslucent)
+				Gather(i_rWalk, rStep, *m_Bone, rBone.m_Matrix, rBone.m_Colour, rBone.m_Id);
 		}
+	Draw(i_rWalk, rStep);
 }
 
 void VRenderSubjectDynamics::RenderSpheres(const VWalk& i_rWalk,
@@ -271,25 +264,18 @@ void VRenderSubjectDynamics::RenderRotationTargets(const VWalk& i_rWalk)
 {
 	for (const bool bThin : {false, true})
 		for (const std::size_t part : {0u, 1u})
-		{
-			CoreGraphics::VShape& rShape = m_ArrowShapes[bThin][part];
-			if (!Begin(i_rWalk, m_Arrows, rShape))
-				return;
 			for (const auto& rpSubject : i_rWalk.m_rSubjects)
 				for (const VRenderSubjectData::VRotationTarget& rTarget : rpSubject->m_RotationTargets)
-					if (IsThin(i_rWalk.m_rContext, rTarget) == bThin)
-						RenderArrows(i_rWalk, rTarget, part, rShape);
-		}
-}
-
-void VRenderSubjectDynamics::RenderArrows(const VWalk& i_rWalk, const VRenderSubjectData::VRotationTarget& i_rTarget,
-    std::size_t i_Part, CoreGraphics::VShape& io_rShape)
-{
-	// The shaft shows where the target is, the head where the segment is.
-	const QMatrix4x4& rFrame = i_Part == 0 ? i_rTarget.m_Target : i_rTarget.m_Segment;
-	for (std::size_t axis = 0; axis < m_ArrowParts.size(); ++axis)
-		if (Place(i_rWalk, m_Arrows, rFrame * m_ArrowParts[axis][i_Part], c_AxisColours[axis], i_rTarget.m_Id))
-			i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, io_rShape.m_Indices);
+				{
+					if (IsThin(i_rWalk.m_rContext, rTarget) != bThin)
+						continue;
+					// The shaft shows where the target is, the head where the segment is.
+					const QMatrix4x4& rFrame = part == 0 ? rTarget.m_Target : rTarget.m_Segment;
+					for (std::size_t axis = 0; axis < m_ArrowParts.size(); ++axis)
+						Gather(i_rWalk, m_Arrows, m_ArrowShapes[bThin][part], rFrame * m_ArrowParts[axis][part],
+						    c_AxisColours[axis], rTarget.m_Id);
+				}
+	Draw(i_rWalk, m_Arrows);
 }
 
 void VRenderSubjectDynamics::RenderSkins(const VWalk& i_rWalk)
@@ -315,26 +301,18 @@ void VRenderSubjectDynamics::RenderSkins(const VWalk& i_rWalk)
 
 void VRenderSubjectDynamics::RenderMissingMarkers(const VWalk& i_rWalk)
 {
-	if (!Begin(i_rWalk, m_MissingMarkers, m_Sphere))
-		return;
 	for (const auto& rpSubject : i_rWalk.m_rSubjects)
 		for (const VRenderSubjectData::VShape& rMarker : rpSubject->m_MissingMarkers)
-		{
-			Place(i_rWalk, m_MissingMarkers, rMarker.m_PositionAndSize, rMarker.m_Colour, rMarker.m_Id);
-			i_rWalk.m_rContext.DrawElements(GL_TRIANGLES, m_Sphere.m_Indices);
-		}
+			Gather(i_rWalk, m_MissingMarkers, m_Sphere, rMarker.m_PositionAndSize, rMarker.m_Colour, rMarker.m_Id);
+	Draw(i_rWalk, m_MissingMarkers);
 }
 
 void VRenderSubjectDynamics::RenderAxes(const VWalk& i_rWalk)
 {
-	if (!Begin(i_rWalk, m_Axes, m_AxesLines))
-		return;
 	for (const auto& rpSubject : i_rWalk.m_rSubjects)
 		for (const QMatrix4x4& rMatrix : rpSubject->m_Axes)
-		{
-			Place(i_rWalk, m_Axes, rMatrix, {}, {});
-			i_rWalk.m_rContext.DrawElements(GL_LINES, m_AxesLines.m_Indices);
-		}
+			Gather(i_rWalk, m_Axes, m_AxesLines, rMatrix, {}, {});
+	Draw(i_rWalk, m_Axes);
 }
 
 } // namespace Flow2Graphics

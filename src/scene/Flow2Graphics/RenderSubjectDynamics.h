@@ -1,9 +1,8 @@
 #pragma once
 
 #include "CoreGraphics/RenderState.h"
-#include "CoreGraphics/SelectableProgram.h"
+#include "CoreGraphics/ShapeBatch.h"
 #include "CoreGraphics/Shapes.h"
-#include "CoreGraphics/Uniform.h"
 #include "Flow2Graphics/RenderSubjectData.h"
 #include "Flow2Graphics/SubjectTypes.h"
 #include "OrlexGraphics/frame/IRenderType.h"
@@ -36,7 +35,8 @@ const OrlexGraphics::VSubjectOptions& SubjectOptions(
     const OrlexGraphics::VSceneOptions& i_rOptions, ESubjectClass i_Class);
 
 /// Draws bones, joints, targets, axes, origins and what is missing of all subjects: a walk over their arrays, that does
-/// no mathematics of subjects and allocates nothing. Render thread; made with the context current.
+/// no mathematics of subjects and allocates nothing. All bones of a class are one draw, as are all its boxes, arrows...
+/// Render thread; made with the context current.
 class VRenderSubjectDynamics : public OrlexGraphics::IRenderType
 {
 public:
@@ -59,6 +59,7 @@ private:
 	struct VWalk
 	{
 		CoreGraphics::VRenderContext& m_rContext;
+		ESubjectClass m_Class;
 		const VSubjects& m_rSubjects;
 		const OrlexGraphics::VSubjectOptions& m_rOptions;
 		std::uint32_t m_Pass;
@@ -68,17 +69,17 @@ private:
 		bool m_bPick;
 	};
 
-	/// A program with what it is given for each element.
+	/// A program with the shapes that it draws, by class and pass.
 	struct VStep
 	{
-		CoreGraphics::VSelectableProgram m_Program;
+		std::shared_ptr<CoreGraphics::VShaderProgram> m_pProgram;
 		CoreGraphics::VRenderState m_State;
 		CoreGraphics::VRenderState m_SelectionState;
-		CoreGraphics::VUniform m_Place;
-		CoreGraphics::VUniform m_Colour;
+		unsigned int m_Mode;
+		std::array<std::array<CoreGraphics::VShapeBatch, 2>, ESubjectClassCount> m_Batches;
 
-		VStep(CoreGraphics::VShaderLibrary& io_rLibrary, const std::string& i_rVertex, const std::string& i_rFragment,
-		    const CoreGraphics::VRenderState& i_rState, const char* i_pPlace, const char* i_pColour);
+		VStep(CoreGraphics::VShaderLibrary& io_rLibrary, const std::string& i_rFragment,
+		    const CoreGraphics::VRenderState& i_rState, unsigned int i_Mode);
 	};
 
 	void RenderList(const VWalk& i_rWalk);
@@ -87,20 +88,21 @@ private:
 	void RenderBoxes(const VWalk& i_rWalk);
 	void RenderBones(const VWalk& i_rWalk);
 	void RenderRotationTargets(const VWalk& i_rWalk);
-	void RenderArrows(const VWalk& i_rWalk, const VRenderSubjectData::VRotationTarget& i_rTarget, std::size_t i_Part,
-	    CoreGraphics::VShape& io_rShape);
 	void RenderSpheres(const VWalk& i_rWalk, std::vector<VRenderSubjectData::VShape> VRenderSubjectData::*i_pSpheres,
 	    std::uint32_t i_LevelCap);
 	void RenderSkins(const VWalk& i_rWalk);
 	void RenderMissingMarkers(const VWalk& i_rWalk);
 	void RenderAxes(const VWalk& i_rWalk);
 
-	/// The program and its state, for drawing a shape. False if there is nothing to draw with.
-	bool Begin(const VWalk& i_rWalk, VStep& io_rStep, CoreGraphics::VShape& io_rShape);
-	/// False if the element is hidden from the pick.
+	/// Where the walk gathers what a step draws.
+	CoreGraphics::VShapeBatch& BatchOf(const VWalk& i_rWalk, VStep& io_rStep);
+	/// @param i_rPlace a matrix, or a place and a scale
+	/// @return false if the element is hidden from the pick.
 	template <typename TPlace>
-	bool Place(const VWalk& i_rWalk, VStep& io_rStep, const TPlace& i_rPlace, const QVector4D& i_rColour,
-	    const CoreGraphics::VSelectionId& i_rId);
+	bool Gather(const VWalk& i_rWalk, VStep& io_rStep, const CoreGraphics::VShape& i_rShape, const TPlace& i_rPlace,
+	    const QVector4D& i_rColour, const CoreGraphics::VSelectionId& i_rId);
+	/// What was gathered, until the next step begins.
+	void Draw(const VWalk& i_rWalk, VStep& io_rStep);
 
 	const std::shared_ptr<const OrlexGraphics::VSelectionRegistry> m_pRegistry;
 	const std::shared_ptr<OrlexGraphics::VSphereHelper> m_pSphereHelper;
@@ -123,6 +125,9 @@ private:
 	VStep m_Arrows;
 	VStep m_MissingMarkers;
 	VStep m_Axes;
+	/// Ids, of one step after the other.
+	CoreGraphics::VShapeBatch m_IdBatch;
+	const std::shared_ptr<CoreGraphics::VShaderProgram> m_pIds;
 	/// Of shaft and head for each axis, within the frame of target or segment.
 	std::array<std::array<QMatrix4x4, 2>, 3> m_ArrowParts;
 };

@@ -31,18 +31,14 @@ const std::array<float, VSphereHelper::c_Levels>& Chords()
 	return s_Chords;
 }
 
-std::uint8_t Byte(float i_Value)
-{
-	return static_cast<std::uint8_t>(std::lround(std::clamp(i_Value, 0.0f, 1.0f) * 255.0f));
-}
-
 } // namespace
 
 VSphereHelper::VSphereHelper(
     CoreGraphics::VShaderLibrary& io_rLibrary, std::shared_ptr<const VSelectionRegistry> i_pRegistry)
     : m_pRegistry(std::move(i_pRegistry)), m_Spheres{CoreGraphics::MakeSphere(0), CoreGraphics::MakeSphere(1),
                                                CoreGraphics::MakeSphere(2), CoreGraphics::MakeSphere(3)},
-      m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, "Sphere", "SimpleLighting")),
+      m_pProgram(io_rLibrary.GetProgram("Placed", "SimpleLighting")),
+      m_pIdProgram(io_rLibrary.GetProgram("Placed", "Colour")),
       m_pPointProgram(io_rLibrary.GetProgram("Point3D", "Colour"))
 {
 	m_State.m_Cull = CoreGraphics::ECullBack;
@@ -65,10 +61,21 @@ void VSphereHelper::Begin(CoreGraphics::VRenderContext& io_rContext)
 	m_ViewProjection = io_rContext.m_Projection * io_rContext.m_View;
 	m_PixelScale = static_cast<float>(io_rContext.m_Viewport.height()) * io_rContext.m_Projection(1, 1) * 0.5f;
 	m_Splats.clear();
-	m_BoundLevel = -1;
-	const bool bSelection = io_rContext.m_Mode != CoreGraphics::ERenderNormal;
-	m_bUsable = io_rContext.UseProgram(m_Program.Get(bSelection));
-	io_rContext.ApplyState(bSelection ? m_SelectionState : m_State);
+	if (io_rContext.m_Mode != CoreGraphics::ERenderNormal)
+		m_pBatch = &m_IdWalk;
+	else
+	{
+		if (m_Walk == m_Walks.size())
+			m_Walks.emplace_back();
+		m_pBatch = &m_Walks[m_Walk++];
+	}
+	m_pBatch->Clear();
+}
+
+void VSphereHelper::Clear()
+{
+	m_PickPoints.clear();
+	m_Walk = 0;
 }
 
 void VSphereHelper::Draw(CoreGraphics::VRenderContext& io_rContext, const QVector4D& i_rSphere,
@@ -83,27 +90,15 @@ void VSphereHelper::Draw(CoreGraphics::VRenderContext& io_rContext, const QVecto
 		return;
 	const int level = clip.w() > 0.0f ? Level(i_rSphere.w() * m_PixelScale / clip.w(), i_LevelCap)
 	                                  : static_cast<int>(std::min(i_LevelCap, c_Levels - 1));
-	if (level < 0)
+	const CoreGraphics::VColourBytes colour =
+	    bSelection ? CoreGraphics::ColourBytes(i_rId) : CoreGraphics::ColourBytes(i_rColour);
+	if (level >= 0)
 	{
-		VSplat splat{{i_rSphere.x(), i_rSphere.y(), i_rSphere.z()}, {0, 0, 0, 1}};
-		for (int i = 0; i < (bSelection ? 3 : 4); ++i)
-			splat.m_Colour[i] =
-			    bSelection ? static_cast<std::uint8_t>(i_rId.m_Id >> (8 * i) & 0xff) : Byte(i_rColour[i]);
-		m_Splats.push_back(splat);
-		AddPickPoint(io_rContext, i_rSphere.toVector3D(), i_rId);
+		m_pBatch->Add(m_Spheres[static_cast<std::size_t>(level)], i_rSphere, colour);
 		return;
 	}
-	if (!m_bUsable)
-		return;
-	CoreGraphics::VShape& rSphere = m_Spheres[static_cast<std::size_t>(level)];
-	if (m_BoundLevel != level)
-		io_rContext.BindVertices(rSphere.m_Vertices);
-	m_BoundLevel = level;
-	if (bSelection)
-		m_Program.SetId(io_rContext, i_rId);
-	io_rContext.SetUniform(m_PosAndSize, i_rSphere);
-	io_rContext.SetUniform(m_ModelColour, i_rColour);
-	io_rContext.DrawElements(GL_TRIANGLES, rSphere.m_Indices);
+	m_Splats.push_back({{i_rSphere.x(), i_rSphere.y(), i_rSphere.z()}, colour});
+	AddPickPoint(io_rContext, i_rSphere.toVector3D(), i_rId);
 }
 
 void VSphereHelper::AddPickPoint(
@@ -117,6 +112,10 @@ void VSphereHelper::AddPickPoint(
 
 void VSphereHelper::End(CoreGraphics::VRenderContext& io_rContext)
 {
+	const bool bSelection = io_rContext.m_Mode != CoreGraphics::ERenderNormal;
+	io_rContext.ApplyState(bSelection ? m_SelectionState : m_State);
+	if (!m_pBatch->IsEmpty() && io_rContext.UseProgram(bSelection ? m_pIdProgram : m_pProgram))
+		m_pBatch->Draw(io_rContext, GL_TRIANGLES);
 	if (m_Splats.empty() || !io_rContext.UseProgram(m_pPointProgram))
 		return;
 	m_SplatBuffer.Upload(m_Splats.data(), m_Splats.size() * sizeof(VSplat));

@@ -2,10 +2,8 @@
 
 #include "CoreGraphics/Buffers.h"
 #include "CoreGraphics/RenderState.h"
-#include "CoreGraphics/SelectableProgram.h"
+#include "CoreGraphics/ShapeBatch.h"
 #include "CoreGraphics/Shapes.h"
-#include "CoreGraphics/Uniform.h"
-#include "CoreGraphics/VertexFormat.h"
 
 #include <QMatrix4x4>
 #include <QRect>
@@ -21,6 +19,7 @@ namespace CoreGraphics
 {
 class VRenderContext;
 class VShaderLibrary;
+class VShaderProgram;
 } // namespace CoreGraphics
 
 namespace OrlexGraphics
@@ -28,8 +27,8 @@ namespace OrlexGraphics
 
 class VSelectionRegistry;
 
-/// Draws every sphere of a scene as finely as its size on screen asks for; those of less than two pixels become points,
-/// which End draws all at once. Made with the context current.
+/// Draws every sphere of a scene as finely as its size on screen asks for; those of less than two pixels become points.
+/// End draws all at once. Made with the context current.
 class VSphereHelper
 {
 public:
@@ -45,15 +44,15 @@ public:
 	/// @param i_LevelCap the finest mesh to use, 0 to 3
 	void Draw(CoreGraphics::VRenderContext& io_rContext, const QVector4D& i_rSphere,
 	    const CoreGraphics::VSelectionId& i_rId, const QVector4D& i_rColour, std::uint32_t i_LevelCap);
-	/// Draws the points since Begin.
+	/// Draws what came since Begin.
 	void End(CoreGraphics::VRenderContext& io_rContext);
 
 	/// A place by which a rectangle finds something else that is drawn, too. Nothing unless a pick is drawn.
 	void AddPickPoint(const CoreGraphics::VRenderContext& i_rContext, const QVector3D& i_rPlace,
 	    const CoreGraphics::VSelectionId& i_rId);
 
-	/// Forgets the points of the frame.
-	void Clear() { m_PickPoints.clear(); }
+	/// Begins a frame: forgets its points.
+	void Clear();
 	/// Adds the ids, without flags, of points that lie in a rectangle and were not found before: a point may have lost
 	/// its pixel to another one.
 	/// @param i_rRectangle in pixels of the viewport of the last pick
@@ -67,7 +66,7 @@ private:
 	struct VSplat
 	{
 		float m_Position[3];
-		std::uint8_t m_Colour[4];
+		CoreGraphics::VColourBytes m_Colour;
 	};
 	static_assert(sizeof(VSplat) == 16);
 
@@ -81,19 +80,21 @@ private:
 
 	const std::shared_ptr<const VSelectionRegistry> m_pRegistry;
 	std::array<CoreGraphics::VShape, c_Levels> m_Spheres;
-	CoreGraphics::VSelectableProgram m_Program;
+	const std::shared_ptr<CoreGraphics::VShaderProgram> m_pProgram;
+	const std::shared_ptr<CoreGraphics::VShaderProgram> m_pIdProgram;
 	const std::shared_ptr<CoreGraphics::VShaderProgram> m_pPointProgram;
-	CoreGraphics::VUniform m_PosAndSize{"u_ReconPosAndSize"};
-	CoreGraphics::VUniform m_ModelColour{"u_ModelColour"};
 	CoreGraphics::VRenderState m_State;
 	CoreGraphics::VRenderState m_SelectionState;
 	std::vector<VSplat> m_Splats;
 	CoreGraphics::VStreamBuffer m_SplatBuffer;
 	std::vector<VPickPoint> m_PickPoints;
+	/// The meshes of each walk of a frame, which are mostly those of the frame before.
+	std::vector<CoreGraphics::VShapeBatch> m_Walks;
+	std::size_t m_Walk = 0;
+	CoreGraphics::VShapeBatch m_IdWalk;
+	CoreGraphics::VShapeBatch* m_pBatch = nullptr;
 	QMatrix4x4 m_ViewProjection;
 	float m_PixelScale = 0.0f;
-	bool m_bUsable = false;
-	int m_BoundLevel = -1;
 };
 
 } // namespace OrlexGraphics
