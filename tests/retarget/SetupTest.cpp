@@ -151,7 +151,9 @@ TEST_F(Recipe, WritesNothingWhereACheckDoesNotHoldOrNothingIsAskedFor)
 	         VRow{with("\"prune-joints\"", "\"prune-join\""), {}, 3,
 	             "recipe.json:10: there is no edit \"--prune-join\""},
 	         VRow{with("\"Pelvis\"", "\"Pelvos\""), {}, 2, "recipe.json:8: there is no source segment \"Pelvos\""},
-	         VRow{with("\"fbx\"", "\"subject\""), {}, 3, "\"root\" chooses a bone of an FBX file"},
+	         VRow{with("\"root\": 0", "\"root\": \"nobody\""), {}, 2, "recipe.json:6: there is no bone \"nobody\""},
+	         VRow{with("\"root\": 0", "\"root\": {}"), {}, 3, "recipe.json:6: \"root\" is to be"},
+	         VRow{with("\"fbx\"", "\"subject\""), {}, 3, "recipe.json:6: \"root\" chooses a bone of an FBX file"},
 	         VRow{with("\"fbx\": \"demo/character.fbx\",", ""), {}, 3, "either \"fbx\" or \"subject\""},
 	         VRow{with("mapping.json", "recipe.json"), {}, 3, "demo/recipe.json"}})
 	{
@@ -196,10 +198,20 @@ TEST_F(Recipe, PresetsFitByNamesAndByProposal)
 	EXPECT_GE(other.at("pairs"), 20);
 	EXPECT_EQ(other.at("proposed")[0].at("foundTarget"), "Hips");
 	RunJson({"create", "--fbx", c_Fbx, "-o", "bare.qrr", "--json", "-q"}, m_Folder);
-	RunRows({{"a recipe", {"edit", "x.qrr", "--source", "demo/performer.qrs", "--preset", "recipe.json", "-o", "x.qrr"},
-	             3, "", "recipe.json:3: \"fbx\" does not belong into a preset"},
-	            {"another file", {"preset", "save", "x.qrr", "-o", "demo.qrr"}, 2, "", "end in .json"},
-	            {"no target", {"preset", "save", "bare.qrr", "-o", "y.json"}, 1, "", "no position or rotation target"}},
+	m_Folder.Write("empty.json", "{\"comment\": \"\",\n\"pairs\": []}");
+	m_Folder.Write("root.json", "{\"root\": [], \"pairs\": []}");
+	RunRows(
+	    {{"a recipe", {"edit", "x.qrr", "--source", "demo/performer.qrs", "--preset", "recipe.json", "-o", "x.qrr"}, 3,
+	         "", "recipe.json:3: \"fbx\" does not belong into a preset"},
+	        {"no pairs", {"edit", "x.qrr", "--source", "demo/performer.qrs", "--preset", "empty.json", "-o", "x.qrr"},
+	            3, "", "empty.json:2: a preset needs pairs"},
+	        {"no joints", {"solve", "x.qrr", "--take", "demo/walk.bvh", "--joints", "empty.json"}, 3, "",
+	            "empty.json:2: a mapping of joints needs pairs"},
+	        {"a rubbish root",
+	            {"edit", "x.qrr", "--source", "demo/performer.qrs", "--preset", "root.json", "-o", "x.qrr"}, 3, "",
+	            "root.json:1: \"root\" is to be"},
+	        {"another file", {"preset", "save", "x.qrr", "-o", "demo.qrr"}, 2, "", "end in .json"},
+	        {"no target", {"preset", "save", "bare.qrr", "-o", "y.json"}, 1, "", "no position or rotation target"}},
 	    m_Folder);
 }
 

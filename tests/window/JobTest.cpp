@@ -396,6 +396,15 @@ TEST_F(Job, JudgesProposedTargets)
 		auto* const pItem = itemOf(rTable, "L_Humerus");
 		ASSERT_TRUE(pItem);
 		EXPECT_TRUE(rTable.item(pItem->row(), 6)->text().contains("name")) << "a reason";
+		auto& rFilter = *rDialog.findChild<QWidget*>("PairsFilter");
+		click(rDialog, rFilter, rFilter.rect().center());
+		for (const char letter : std::string("armleft"))
+			QTest::keyClick(rDialog.windowHandle(), letter);
+		EXPECT_EVENTUALLY(!rTable.isRowHidden(pItem->row()));
+		EXPECT_TRUE(rTable.isRowHidden(itemOf(rTable, "R_Humerus")->row()));
+		for (int i = 0; i < 7; ++i)
+			QTest::keyClick(rDialog.windowHandle(), Qt::Key_Backspace);
+		EXPECT_FALSE(rTable.isRowHidden(itemOf(rTable, "R_Humerus")->row()));
 		const_cast<QTableWidget&>(rTable).scrollToItem(pItem);
 		click(rDialog, *rTable.viewport(), rTable.visualItemRect(rTable.item(pItem->row(), 6)).center());
 		ASSERT_EQ(selection().size(), 2u);

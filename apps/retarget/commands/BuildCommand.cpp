@@ -26,18 +26,31 @@ struct VBuildSettings
 	bool m_bDryRun = false;
 };
 
+/// A field of the text, as "FILE:LINE: "; its first line for one that it does not have.
+std::string WhereOf(const SetupIO::VSetup& i_rSetup, const std::string& i_rPath, const std::string& i_rField)
+{
+	const auto field = std::ranges::find(i_rSetup.m_Fields, i_rField, &std::pair<std::string, std::size_t>::first);
+	return i_rPath + ":" + std::to_string(field == i_rSetup.m_Fields.end() ? 1 : field->second) + ": ";
+}
+
 VMaking MakingOf(const SetupIO::VSetup& i_rRecipe, const std::string& i_rPath)
 {
 	if (i_rRecipe.m_Fbx.empty() == i_rRecipe.m_Subject.empty())
-		throw VCommandError(EBadInput, i_rPath + ": a recipe begins with one file: either \"fbx\" or \"subject\"");
+		throw VCommandError(EBadInput,
+		    WhereOf(i_rRecipe, i_rPath, i_rRecipe.m_Subject.empty() ? "" : "subject")
+		        + "a recipe begins with one file: either \"fbx\" or \"subject\"");
 	if (!i_rRecipe.m_Root.empty() && i_rRecipe.m_Fbx.empty())
-		throw VCommandError(EBadInput, i_rPath + ": \"root\" chooses a bone of an FBX file, and \"subject\" has none");
+		throw VCommandError(EBadInput,
+		    WhereOf(i_rRecipe, i_rPath, "root") + "\"root\" chooses a bone of an FBX file, and \"subject\" has none");
 	const auto beside = [&](const std::string& i_rFile)
 	{ return i_rFile.empty() ? i_rFile : PathBeside(i_rPath, i_rFile); };
 	VMaking making{
 	    beside(i_rRecipe.m_Fbx), beside(i_rRecipe.m_Subject), beside(i_rRecipe.m_Source), {}, i_rRecipe.m_RootHeight};
 	if (!i_rRecipe.m_Root.empty())
+	{
 		making.m_Root = i_rRecipe.m_Root;
+		making.m_RootWhere = WhereOf(i_rRecipe, i_rPath, "root");
+	}
 	return making;
 }
 
@@ -94,13 +107,6 @@ private:
 
 	std::vector<VInput> m_Inputs;
 };
-
-/// A field of the text, as "FILE:LINE: "; the file alone for one that it does not have.
-std::string WhereOf(const SetupIO::VSetup& i_rSetup, const std::string& i_rPath, const std::string& i_rField)
-{
-	const auto field = std::ranges::find(i_rSetup.m_Fields, i_rField, &std::pair<std::string, std::size_t>::first);
-	return i_rPath + ":" + (field == i_rSetup.m_Fields.end() ? "" : std::to_string(field->second) + ":") + " ";
-}
 
 EExitStatus Build(const VBuildSettings& i_rSettings)
 {

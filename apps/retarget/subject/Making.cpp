@@ -28,7 +28,7 @@ void MakeSubject(VSession& io_rSession, const VMaking& i_rMaking, const VEdits& 
 	}
 	// The target subject takes the source's name when it is made.
 	loadSource();
-	io_rSession.CreateTarget(i_rMaking.m_Fbx, i_rMaking.m_Root, TakesProposal(i_rEdits));
+	io_rSession.CreateTarget(i_rMaking.m_Fbx, i_rMaking.m_Root, TakesProposal(i_rEdits), i_rMaking.m_RootWhere);
 	if (const auto worst = io_rSession.Document().DifferenceFromFile())
 		NVX_LOG(c_pCategory, NVX::ELogWarning,
 		    "The bind pose as built differs from the pose in the file, %1%; --match-file-pose mends it",

@@ -21,6 +21,8 @@ struct VMaking
 	std::string m_RootHeight;
 	/// An operator typed the edits: what is left open is chosen for the best, and told. Texts and programs say it all.
 	bool m_bTyped = false;
+	/// Where a text has the root, as "FILE:LINE: ".
+	std::string m_RootWhere = {};
 };
 
 /// Reads the files and runs the edits. Throws VCommandError to fail.

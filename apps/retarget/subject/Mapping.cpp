@@ -127,8 +127,6 @@ void ApplyPreset(VSession& io_rSession, const std::string& i_rPath)
 {
 	const CoreOrlexTypes::VSubjectParametrised& rSource = io_rSession.Source("--preset");
 	const SetupIO::VSetup preset = ParseSetup(ReadSetupText(i_rPath, "a preset"), i_rPath, {"pairs"}, "a preset");
-	if (preset.m_Pairs.empty())
-		throw VCommandError(EBadInput, "\"" + i_rPath + "\" holds no pairs");
 	const VMapped mapped = ProposeForSubject(io_rSession);
 	const RetargetSetup::VPresetFit fit =
 	    RetargetSetup::FitPreset(preset.m_Pairs, rSource, io_rSession.Target(), &mapped.m_Proposal);

@@ -129,13 +129,21 @@ void VSession::LoadFbx(const std::string& i_rPath)
 		        + " bones up to where it broke off");
 }
 
-void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot, bool i_bBodyRoot)
+void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot, bool i_bBodyRoot,
+    const std::string& i_rRootWhere)
 {
 	LoadFbx(i_rPath);
 	const auto pSkeleton = m_pDocument->GetFBXSkeleton();
 	m_Root = 0;
 	if (i_rRoot)
-		m_Root = FindRootBone(*i_rRoot, *pSkeleton);
+		try
+		{
+			m_Root = FindRootBone(*i_rRoot, *pSkeleton);
+		}
+		catch (const VCommandError& rError)
+		{
+			throw VCommandError(rError.Status(), i_rRootWhere + rError.what());
+		}
 	else if (const std::int64_t root = i_bBodyRoot ? ProposeForFile(*this).m_Root : -1; root >= 0)
 		m_Root = std::size_t(root);
 	if (i_rRoot || *m_Root != 0)

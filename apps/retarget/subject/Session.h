@@ -34,7 +34,8 @@ public:
 	/// Reads the FBX file and makes the target subject of it, from the root bone of this name or index on; without one
 	/// the choice is the document's. EWrongUsage for a root that the file does not have.
 	/// @param i_bBodyRoot without a name, the root bone that most of the body hangs on, which needs a source.
-	void CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot, bool i_bBodyRoot = false);
+	void CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot, bool i_bBodyRoot = false,
+	    const std::string& i_rRootWhere = {});
 
 	/// EBadOutput if the file could not be written; the one that stood there then stays. "-" is standard output.
 	/// EFindings with --strict, and nothing written, if there has been a warning or saving would bring one.

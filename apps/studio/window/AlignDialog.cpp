@@ -3,6 +3,7 @@
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "studio/panel/RetargetPanel.h"
 #include "studio/window/BesideView.h"
+#include "studio/window/Columns.h"
 #include "studio/window/Named.h"
 #include "studio/window/PlainTexts.h"
 
@@ -17,6 +18,7 @@
 #include <QTableWidget>
 #include <QVBoxLayout>
 
+#include <algorithm>
 #include <utility>
 
 namespace StudioHost
@@ -63,6 +65,9 @@ VAlignDialog::VAlignDialog(
 	m_pTable->setSelectionBehavior(QAbstractItemView::SelectRows);
 	m_pTable->setSelectionMode(QAbstractItemView::SingleSelection);
 	m_pTable->setTabKeyNavigation(false);
+	m_pTable->setWordWrap(false);
+	for (const int column : {EAlignTarget, EAlignSource})
+		m_pTable->setItemDelegateForColumn(column, new VNameColumn(m_pTable));
 	m_pTable->verticalHeader()->hide();
 	m_pTable->horizontalHeader()->setStretchLastSection(true);
 	m_pTable->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
@@ -137,6 +142,8 @@ bool VAlignDialog::Align()
 	}
 	for (int column = 0; column < EAlignNote; ++column)
 		m_pTable->resizeColumnToContents(column);
+	for (const int column : {EAlignTarget, EAlignSource})
+		m_pTable->setColumnWidth(column, std::min(m_pTable->columnWidth(column), c_WidestNames / 2));
 	ShowScale(aligned);
 	QStringList notes{tr("Angles between the directions of segments. Turned by %1 as a whole, moved by %2 mm along the "
 	                     "floor, lifted by %3 mm.")
@@ -185,7 +192,8 @@ void VAlignDialog::ShowJoint(int i_Row, const QVariantMap& i_rJoint)
 	rLock.setCheckState(m_Locked.contains(target) ? Qt::Checked : Qt::Unchecked);
 	rLock.setData(Qt::UserRole, target);
 	m_pTable->item(i_Row, EAlignSource)->setData(Qt::UserRole, source);
-	m_pTable->item(i_Row, EAlignNote)->setToolTip(PlainToolTip(note));
+	for (const int column : {EAlignTarget, EAlignSource, EAlignNote})
+		m_pTable->item(i_Row, column)->setToolTip(PlainToolTip(texts[column]));
 	// What is not better is what is to be looked at.
 	if (after > before + c_SameDegrees)
 		m_pTable->item(i_Row, EAlignAfter)->setForeground(QColor(0xE0, 0xAD, 0x4B));

@@ -3,9 +3,11 @@
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "studio/panel/RetargetPanel.h"
 #include "studio/window/BesideView.h"
+#include "studio/window/Columns.h"
 #include "studio/window/Named.h"
 #include "studio/window/PlainTexts.h"
 
+#include <QAbstractItemView>
 #include <QComboBox>
 #include <QDialogButtonBox>
 #include <QDir>
@@ -14,14 +16,22 @@
 #include <QFileDialog>
 #include <QHeaderView>
 #include <QLabel>
+#include <QLineEdit>
 #include <QLocale>
 #include <QPushButton>
+#include <QScrollArea>
+#include <QScrollBar>
 #include <QSignalBlocker>
+#include <QStyleOptionComboBox>
+#include <QStylePainter>
 #include <QTableWidget>
 #include <QVBoxLayout>
 
 #include <algorithm>
+#include <functional>
 #include <map>
+#include <utility>
+#include <vector>
 
 namespace StudioHost
 {
@@ -59,6 +69,53 @@ const char* NameOf(int i_Column)
 /// A widget of a cell knows its row by this.
 constexpr const char* c_pRow = "row";
 
+/// Of the findings above the table, which a preset of another body may have hundreds of.
+constexpr int c_FindingLines = 7;
+constexpr int c_WidestPopup = 640;
+
+/// Names, those that are too long without their middle. It holds what comes near until somebody turns to it: of
+/// hundreds of rows nobody looks at all lists.
+class VTargetBox final : public QComboBox
+{
+public:
+	/// The rest of its list.
+	std::function<void()> m_Complete;
+
+	void showPopup() override
+	{
+		Complete();
+		view()->setTextElideMode(Qt::ElideMiddle);
+		const int wanted = view()->sizeHintForColumn(0) + view()->verticalScrollBar()->sizeHint().width();
+		view()->setMinimumWidth(std::min(wanted, c_WidestPopup));
+		QComboBox::showPopup();
+	}
+
+protected:
+	void focusInEvent(QFocusEvent* i_pEvent) override
+	{
+		Complete();
+		QComboBox::focusInEvent(i_pEvent);
+	}
+	void paintEvent(QPaintEvent*) override
+	{
+		QStylePainter painter(this);
+		QStyleOptionComboBox option;
+		initStyleOption(&option);
+		painter.drawComplexControl(QStyle::CC_ComboBox, option);
+		const int room =
+		    style()->subControlRect(QStyle::CC_ComboBox, &option, QStyle::SC_ComboBoxEditField, this).width();
+		option.currentText = fontMetrics().elidedText(option.currentText, Qt::ElideMiddle, room - 4);
+		painter.drawControl(QStyle::CE_ComboBoxLabel, option);
+	}
+
+private:
+	void Complete()
+	{
+		if (const auto complete = std::exchange(m_Complete, {}))
+			complete();
+	}
+};
+
 } // namespace
 
 VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::ISelection& io_rSelection,
@@ -68,7 +125,9 @@ VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::
       m_pTable(Named(new QTableWidget(0, EColumnCount), "Pairs", tr("Proposed pairs"))),
       m_pOrigin(Named(new QComboBox, "PairsOrigin", tr("Where the pairs come from"))),
       m_pLeastScore(Named(new QDoubleSpinBox, "LeastScore", tr("Least score"))),
+      m_pFilter(Named(new QLineEdit, "PairsFilter", tr("Rows whose names have this"))),
       m_pFindings(Named(new QLabel, "Findings", tr("How the two stand"))),
+      m_pFindingsArea(Named(new QScrollArea, "FindingsArea", tr("How the two stand"))),
       m_pDetails(Named(new QLabel, "PairDetails", tr("All that is told of the pair"))),
       m_pNote(Named(new QLabel, "PairsNote", tr("Note on the pairs")))
 {
@@ -83,9 +142,14 @@ VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::
 	m_pTable->setSelectionMode(QAbstractItemView::SingleSelection);
 	m_pTable->setEditTriggers(QAbstractItemView::NoEditTriggers);
 	m_pTable->setTabKeyNavigation(false);
+	m_pTable->setWordWrap(false);
+	m_pTable->setItemDelegateForColumn(ESource, new VNameColumn(m_pTable));
 	m_pTable->verticalHeader()->hide();
 	m_pTable->horizontalHeader()->setStretchLastSection(true);
 	m_pTable->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+	m_pFilter->setPlaceholderText(tr("Filter"));
+	m_pFilter->setClearButtonEnabled(true);
+	m_pFilter->setMaximumWidth(c_WidestNames);
 	m_pLeastScore->setLocale(QLocale::c());
 	m_pLeastScore->setRange(0.0, 1.0);
 	m_pLeastScore->setSingleStep(0.05);
@@ -95,6 +159,10 @@ VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::
 		pLabel->setWordWrap(true);
 		pLabel->setTextInteractionFlags(Qt::TextSelectableByMouse);
 	}
+	m_pFindingsArea->setFrameShape(QFrame::NoFrame);
+	m_pFindingsArea->setWidgetResizable(true);
+	m_pFindingsArea->setWidget(m_pFindings);
+	m_pFindings->setAlignment(Qt::AlignLeft | Qt::AlignTop);
 	m_pDetails->setAlignment(Qt::AlignLeft | Qt::AlignTop);
 	m_pDetails->setMinimumHeight(c_DetailLines * fontMetrics().lineSpacing());
 	ListPresets();
@@ -114,6 +182,7 @@ VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::
 	connect(pButtons, &QDialogButtonBox::accepted, this, &VProposeDialog::accept);
 	connect(pButtons, &QDialogButtonBox::rejected, this, &VProposeDialog::reject);
 	connect(m_pLeastScore, qOverload<double>(&QDoubleSpinBox::valueChanged), this, &VProposeDialog::Fill);
+	connect(m_pFilter, &QLineEdit::textChanged, this, &VProposeDialog::Filter);
 	connect(m_pOrigin, qOverload<int>(&QComboBox::activated), this, &VProposeDialog::ChooseOrigin);
 	connect(m_pTable, &QTableWidget::currentCellChanged, this, &VProposeDialog::SelectPair);
 	connect(m_pTable, &QTableWidget::itemChanged, this,
@@ -141,10 +210,11 @@ VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::
 	};
 	add(tr("&Pairs from"), m_pOrigin);
 	add(tr("&Least score"), m_pLeastScore);
+	add(tr("&Show"), m_pFilter);
 	pOrigin->addWidget(m_pNote, 1);
 	auto* const pLayout = new QVBoxLayout(this);
 	pLayout->addLayout(pOrigin);
-	pLayout->addWidget(m_pFindings);
+	pLayout->addWidget(m_pFindingsArea);
 	pLayout->addWidget(m_pTable, 1);
 	pLayout->addWidget(m_pDetails);
 	pLayout->addWidget(pButtons);
@@ -196,7 +266,9 @@ void VProposeDialog::Fill()
 	if (m_Proposal.isEmpty())
 		lines << tr("This is no preset that could be read: the log tells why.");
 	m_pFindings->setText(lines.join('\n'));
-	m_pFindings->setVisible(!lines.isEmpty());
+	m_pFindingsArea->setVisible(!lines.isEmpty());
+	m_pFindingsArea->setMaximumHeight(std::min(int(lines.size()) * 2, c_FindingLines) * fontMetrics().lineSpacing()
+	    + fontMetrics().lineSpacing() / 2);
 	{
 		const QSignalBlocker blocker(m_pTable);
 		m_pTable->setRowCount(0);
@@ -206,9 +278,21 @@ void VProposeDialog::Fill()
 			AddRow(rUnmapped.toMap()["source"].toInt(), -1, rUnmapped.toMap()["reason"].toString());
 		for (int column = ESource; column < EReasons; ++column)
 			m_pTable->resizeColumnToContents(column);
+		for (const int column : {ESource, ETarget})
+			m_pTable->setColumnWidth(column, std::min(m_pTable->columnWidth(column), c_WidestNames));
 	}
+	Filter();
 	m_pTable->setCurrentCell(0, ESource);
 	UpdateNote();
+}
+
+void VProposeDialog::Filter()
+{
+	const QString wanted = m_pFilter->text().trimmed();
+	for (int row = 0; row < m_pTable->rowCount(); ++row)
+		m_pTable->setRowHidden(row,
+		    !m_pTable->item(row, ESource)->text().contains(wanted, Qt::CaseInsensitive)
+		        && !m_Targets.value(TargetOf(row)).contains(wanted, Qt::CaseInsensitive));
 }
 
 void VProposeDialog::AddRow(int i_Source, int i_Target, const QString& i_rReason)
@@ -223,6 +307,7 @@ void VProposeDialog::AddRow(int i_Source, int i_Target, const QString& i_rReason
 	}
 	QTableWidgetItem& rSource = *m_pTable->item(row, ESource);
 	rSource.setText(m_Sources.value(i_Source));
+	rSource.setToolTip(PlainToolTip(rSource.text()));
 	rSource.setData(Qt::UserRole, i_Source);
 	rSource.setFlags(rSource.flags() | Qt::ItemIsUserCheckable);
 	const bool bTick = i_Target >= 0 && !PairOf(i_Source, i_Target)["present"].toBool();
@@ -236,7 +321,7 @@ void VProposeDialog::AddRow(int i_Source, int i_Target, const QString& i_rReason
 		i_pWidget->installEventFilter(this);
 		m_pTable->setCellWidget(row, i_Column, i_pWidget);
 	};
-	auto* const pBox = new QComboBox;
+	auto* const pBox = new VTargetBox;
 	pBox->addItem(tr("(none)"), -1);
 	// What comes near first.
 	for (const char* const pList : {"pairs", "alternatives"})
@@ -250,9 +335,16 @@ void VProposeDialog::AddRow(int i_Source, int i_Target, const QString& i_rReason
 				        : name,
 				    pair["target"]);
 			}
-	for (int target = 0; target < m_Targets.size(); ++target)
-		if (pBox->findData(target) == -1)
-			pBox->addItem(m_Targets[target], target);
+	pBox->m_Complete = [this, pBox]
+	{
+		std::vector<bool> listed(std::size_t(m_Targets.size()));
+		for (int i = 0; i < pBox->count(); ++i)
+			if (const int target = pBox->itemData(i).toInt(); target >= 0)
+				listed[std::size_t(target)] = true;
+		for (int target = 0; target < m_Targets.size(); ++target)
+			if (!listed[std::size_t(target)])
+				pBox->addItem(m_Targets[target], target);
+	};
 	pBox->setCurrentIndex(pBox->findData(i_Target));
 	connect(pBox, qOverload<int>(&QComboBox::activated), this,
 	    [this, row]
@@ -352,6 +444,7 @@ double VProposeDialog::WeightOf(int i_Row, int i_Column) const
 void VProposeDialog::ShowPair(int i_Row, const QString& i_rReason)
 {
 	const int target = TargetOf(i_Row);
+	BoxOf(i_Row)->setToolTip(PlainToolTip(m_Targets.value(target)));
 	const QVariantMap pair = target >= 0 ? PairOf(SourceOf(i_Row), target) : QVariantMap{{"reasons", i_rReason}};
 	const QVariant score = pair["score"];
 	QTableWidgetItem& rScore = *m_pTable->item(i_Row, EScore);
@@ -393,7 +486,9 @@ void VProposeDialog::TickAll(bool i_bTicked)
 	{
 		const QSignalBlocker blocker(m_pTable);
 		for (int row = 0; row < m_pTable->rowCount(); ++row)
-			m_pTable->item(row, ESource)->setCheckState(i_bTicked && TargetOf(row) >= 0 ? Qt::Checked : Qt::Unchecked);
+			if (!m_pTable->isRowHidden(row))
+				m_pTable->item(row, ESource)
+				    ->setCheckState(i_bTicked && TargetOf(row) >= 0 ? Qt::Checked : Qt::Unchecked);
 	}
 	m_pTable->viewport()->update();
 	UpdateNote();

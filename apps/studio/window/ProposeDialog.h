@@ -10,7 +10,9 @@
 class QComboBox;
 class QDoubleSpinBox;
 class QLabel;
+class QLineEdit;
 class QPushButton;
+class QScrollArea;
 class QTableWidget;
 
 namespace TesselPluginInterface
@@ -51,6 +53,8 @@ private:
 	/// The pairs are others: what is proposed, or a preset.
 	void ChooseOrigin();
 	void Fill();
+	/// Hides the rows whose names have not what is asked for.
+	void Filter();
 	void AddRow(int i_Source, int i_Target, const QString& i_rReason);
 	/// What is told of a pair: the proposed one, an alternative, or what the operator has put together.
 	QVariantMap PairOf(int i_Source, int i_Target) const;
@@ -62,6 +66,7 @@ private:
 	double WeightOf(int i_Row, int i_Column) const;
 	void ShowPair(int i_Row, const QString& i_rReason);
 	void ShowKinds(int i_Row);
+	/// Of the rows that are shown.
 	void TickAll(bool i_bTicked);
 	void SelectPair();
 	void ShowDetails();
@@ -79,7 +84,9 @@ private:
 	QComboBox* const m_pOrigin;
 	int m_Origin = 0;
 	QDoubleSpinBox* const m_pLeastScore;
+	QLineEdit* const m_pFilter;
 	QLabel* const m_pFindings;
+	QScrollArea* const m_pFindingsArea;
 	QLabel* const m_pDetails;
 	QLabel* const m_pNote;
 	QPushButton* m_pAdd = nullptr;

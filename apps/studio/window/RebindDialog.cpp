@@ -2,10 +2,13 @@
 
 #include "studio/panel/RetargetPanel.h"
 #include "studio/window/BesideView.h"
+#include "studio/window/Columns.h"
 #include "studio/window/Named.h"
+#include "studio/window/PlainTexts.h"
 
 #include <QCheckBox>
 #include <QDialogButtonBox>
+#include <QHeaderView>
 #include <QLabel>
 #include <QPushButton>
 #include <QTreeWidget>
@@ -35,6 +38,9 @@ VRebindDialog::VRebindDialog(
 	             "it? Targets, joints and poses are kept where their segments are found again."));
 	auto* const pTree = Named(new QTreeWidget, "RebindList", tr("What becomes of what"));
 	pTree->setHeaderHidden(true);
+	pTree->setWordWrap(true);
+	pTree->setItemDelegate(new VSentenceColumn(*pTree));
+	connect(pTree->header(), &QHeaderView::sectionResized, pTree, &QTreeWidget::doItemsLayout);
 	pTree->setSelectionMode(QAbstractItemView::NoSelection);
 	const auto add = [&](const QString& i_rTitle, const QStringList& i_rLines)
 	{
@@ -42,7 +48,7 @@ VRebindDialog::VRebindDialog(
 			return;
 		auto* const pGroup = new QTreeWidgetItem(pTree, {i_rTitle.arg(i_rLines.size())});
 		for (const QString& rLine : i_rLines)
-			new QTreeWidgetItem(pGroup, {rLine});
+			(new QTreeWidgetItem(pGroup, {rLine}))->setToolTip(0, PlainToolTip(rLine));
 		pGroup->setExpanded(true);
 	};
 	// The first is what there is to decide on.

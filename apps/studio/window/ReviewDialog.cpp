@@ -3,6 +3,7 @@
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "studio/panel/RetargetPanel.h"
 #include "studio/window/BesideView.h"
+#include "studio/window/Columns.h"
 #include "studio/window/Named.h"
 #include "studio/window/PlainTexts.h"
 
@@ -22,9 +23,6 @@ namespace StudioHost
 {
 namespace
 {
-
-/// No column but the last is wider, in pixels.
-constexpr int c_WidestColumn = 200;
 
 QVariantMap RowOf(const QTreeWidgetItem* i_pItem)
 {
@@ -48,7 +46,23 @@ VReviewDialog::VReviewDialog(const VReview& i_rReview, VRetargetPanel& i_rPanel,
 	m_pRows->setHeaderHidden(i_rReview.m_Columns.size() == 1);
 	m_pRows->setRootIsDecorated(false);
 	m_pRows->setAllColumnsShowFocus(true);
+	m_pRows->setAlternatingRowColors(true);
+	m_pRows->setWordWrap(true);
+	m_pRows->header()->setStretchLastSection(false);
+	m_pRows->header()->setSectionResizeMode(i_rReview.m_WideColumn, QHeaderView::Stretch);
+	// Rows are as high as their sentences.
+	connect(m_pRows->header(), &QHeaderView::sectionResized, m_pRows, &QTreeWidget::doItemsLayout);
+	m_pRows->setItemDelegateForColumn(i_rReview.m_WideColumn, new VSentenceColumn(*m_pRows));
+	if (i_rReview.m_WideColumn != 0)
+		m_pRows->setItemDelegateForColumn(0, new VNameColumn(m_pRows));
 	m_pWhole->setWordWrap(true);
+	// A name that is longer than the window does not widen it.
+	for (QLabel* const pLabel : {m_pSummary, m_pWhole})
+	{
+		QSizePolicy policy = pLabel->sizePolicy();
+		policy.setHorizontalPolicy(QSizePolicy::Ignored);
+		pLabel->setSizePolicy(policy);
+	}
 	m_pWhole->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
 	m_pRows->header()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
 	connect(m_pRows, &QTreeWidget::currentItemChanged, this, &VReviewDialog::ChooseRow);
@@ -80,7 +94,7 @@ VReviewDialog::VReviewDialog(const VReview& i_rReview, VRetargetPanel& i_rPanel,
 	pLayout->addWidget(m_pRows, 1);
 	pLayout->addWidget(m_pWhole);
 	pLayout->addWidget(pButtons);
-	resize(620, 480);
+	resize(i_rReview.m_Columns.size() > 1 ? 860 : 620, 480);
 	StandBesideView(*this);
 }
 
@@ -121,10 +135,12 @@ void VReviewDialog::Show(const QVariantMap& i_rReview)
 		for (int column = 0; column < cells.size(); ++column)
 			pItem->setToolTip(column, PlainToolTip(cells[column]));
 	}
-	for (int column = 0; column + 1 < m_pRows->columnCount(); ++column)
+	for (int column = 0; column < m_pRows->columnCount(); ++column)
 	{
+		if (column == m_Review.m_WideColumn)
+			continue;
 		m_pRows->resizeColumnToContents(column);
-		m_pRows->setColumnWidth(column, std::min(m_pRows->columnWidth(column), c_WidestColumn));
+		m_pRows->setColumnWidth(column, std::min(m_pRows->columnWidth(column), c_WidestNames * 3 / 4));
 	}
 	m_pRows->verticalScrollBar()->setValue(scrolled);
 	Await(false);

@@ -28,6 +28,8 @@ struct VReview
 	const char* m_pName = "";
 	QString m_Title;
 	QStringList m_Columns;
+	/// Of the sentences, which takes the room that is left.
+	int m_WideColumn = 0;
 	/// Has the dialog show it, at once or later. False if there is nothing to tell.
 	std::function<bool(VReviewDialog&)> m_Look;
 	/// A button of its own; none without a text.

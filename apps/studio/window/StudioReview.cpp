@@ -59,7 +59,7 @@ void VStudioWindow::CompareWithSaved()
 
 void VStudioWindow::CompareWith(const QString& i_rPath)
 {
-	ShowReview({"Compare", tr("Compare with %1").arg(QFileInfo(i_rPath).fileName()), {tr("What differs")},
+	ShowReview({"Compare", tr("Compare with %1").arg(QFileInfo(i_rPath).fileName()), {tr("What differs")}, 0,
 	    [this, i_rPath](VReviewDialog& io_rShown)
 	    { return ShowIn(io_rShown, m_pRetargetPanel->CompareWith(i_rPath)); }});
 }
@@ -68,7 +68,7 @@ void VStudioWindow::ShowAdvice()
 {
 	if (m_pRetargetPanel)
 		ShowReview(
-		    {"Advice", tr("Advice"), {tr("Joint or target"), tr("Verdict"), tr("Bind pose without it"), tr("Why")},
+		    {"Advice", tr("Advice"), {tr("Joint or target"), tr("Verdict"), tr("Bind pose without it"), tr("Why")}, 3,
 		        [this](VReviewDialog& io_rShown)
 		        {
 			        connect(m_pRetargetPanel.get(), &VRetargetPanel::advised, &io_rShown, &VReviewDialog::Show,
@@ -84,7 +84,7 @@ void VStudioWindow::ShowPoseCheck()
 {
 	if (m_pRetargetPanel)
 		ShowReview({"PoseCheck", tr("Check Pose"), {tr("What"), tr("Looks"), tr("How the two stand"), tr("Mended by")},
-		    [this](VReviewDialog& io_rShown) { return ShowIn(io_rShown, m_pRetargetPanel->CheckPose()); },
+		    2, [this](VReviewDialog& io_rShown) { return ShowIn(io_rShown, m_pRetargetPanel->CheckPose()); },
 		    tr("&Align to Source..."), [this](const QVariantMap&) { ShowAlignment(); }});
 }
 

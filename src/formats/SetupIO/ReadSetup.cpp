@@ -243,6 +243,14 @@ bool HasOnly(
 			o_rFault = {line, Quoted(rName) + " does not belong into " + i_pUse};
 			return false;
 		}
+	if (i_Fields.size() == 1 && *i_Fields.begin() == Fields::c_Pairs && i_rSetup.m_Pairs.empty())
+	{
+		const auto field =
+		    std::ranges::find(i_rSetup.m_Fields, Fields::c_Pairs, &std::pair<std::string, std::size_t>::first);
+		o_rFault = {field == i_rSetup.m_Fields.end() ? 1 : field->second,
+		    std::string(i_pUse) + " needs pairs, and there are none"};
+		return false;
+	}
 	return true;
 }
 

@@ -155,11 +155,6 @@ std::optional<std::vector<SetupIO::VPair>> ReadPreset(const boost::filesystem::p
 		o_rReason = "'" + path + "', line " + std::to_string(fault.m_Line) + ": " + fault.m_Reason;
 		return std::nullopt;
 	}
-	if (preset.m_Pairs.empty())
-	{
-		o_rReason = "'" + path + "' holds no pairs.";
-		return std::nullopt;
-	}
 	return std::move(preset.m_Pairs);
 }
 

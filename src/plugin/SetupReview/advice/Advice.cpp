@@ -47,13 +47,19 @@ std::string RangeSummary(const VRangeOfMotion& i_rRange)
 	std::set<std::size_t> against;
 	for (const VRangeConflict& rConflict : i_rRange.m_Conflicts)
 		against.insert(rConflict.m_Against);
+	if (i_rRange.m_Poses == 0)
+		return "No range of motion: no target follows a segment of this performer that can turn";
 	const std::size_t pullers = against.size();
+	const std::string fights = pullers == 0
+	    ? "no target pulls against another"
+	    : std::to_string(pullers) + (pullers == 1 ? " target pulls" : " targets pull") + " against "
+	        + std::to_string(i_rRange.m_Conflicts.size())
+	        + " others: a lower weight, or lengths that are more alike, helps";
 	return "Range of motion: " + std::to_string(i_rRange.m_Poses) + " poses, in "
 	    + (i_rRange.m_NotConverged == 0
 	            ? "all of which the solve came to its end"
 	            : std::to_string(i_rRange.m_NotConverged) + " of which the solve found only the best it could")
-	    + "; " + std::to_string(pullers) + (pullers == 1 ? " target pulls" : " targets pull") + " against "
-	    + std::to_string(i_rRange.m_Conflicts.size()) + " others: a lower weight, or lengths that are more alike, helps"
+	    + "; " + fights
 	    + (i_rRange.m_Unopposed == 0 ? ""
 	                                 : "; " + std::to_string(i_rRange.m_Unopposed)
 	                + " more are missed by 10 mm or 5 degrees more than at rest, with no single one against them")
