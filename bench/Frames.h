@@ -12,6 +12,7 @@
 #include <QOpenGLFunctions>
 
 #include <cstdio>
+#include <functional>
 #include <memory>
 
 /// Frames of a scene without a window, 1280 by 720 pixels. Needs a display.
@@ -41,6 +42,7 @@ public:
 	}
 
 	OrlexGraphics::VSceneOptions& Options() { return m_pRenderer->m_Input.m_Options; }
+	CoreGraphics::VCameraController& Camera() { return m_pRenderer->m_Input.m_Camera; }
 
 	void Update()
 	{
@@ -97,8 +99,10 @@ private:
 	std::unique_ptr<QOpenGLFramebufferObject> m_pTarget;
 };
 
-/// Ratios::Main with a context current.
-inline int Main(int i_Count, char** i_ppArguments, const std::vector<Ratios::VRatio>& i_rRatios)
+/// Ratios::Main with a context current, and what else is to be told.
+inline int Main(
+    int i_Count, char** i_ppArguments, const std::vector<Ratios::VRatio>& i_rRatios,
+    const std::function<void()>& i_rTell = [] {})
 {
 	QGuiApplication application(i_Count, i_ppArguments);
 	QOffscreenSurface surface;
@@ -109,7 +113,9 @@ inline int Main(int i_Count, char** i_ppArguments, const std::vector<Ratios::VRa
 		std::puts("No OpenGL here, nothing is measured.");
 		return 0;
 	}
-	return Ratios::Main(i_Count, i_ppArguments, i_rRatios);
+	const int status = Ratios::Main(i_Count, i_ppArguments, i_rRatios);
+	i_rTell();
+	return status;
 }
 
 } // namespace Frames

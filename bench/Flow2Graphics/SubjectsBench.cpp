@@ -48,6 +48,7 @@ CoreOrlexTypes::VSubject MakeSubject(std::uint32_t i_Segments)
 		target.m_State = {0.1, 0.2, 0.3};
 		subject.m_Targets.push_back(target);
 	}
+	// What the targets observe.
 	subject.m_Markers.resize((i_Segments + 1) / 2);
 	subject.m_Rotations.resize(i_Segments / 2);
 	return subject;
@@ -89,6 +90,7 @@ Frames::VDrawing MakeDrawing(std::uint32_t i_Segments)
 	pScene->RenderManipulator()->SetVisible(i_Segments > 0);
 	OrlexGraphics::VSubjectOptions& rOptions = drawing.Options().m_LabellingSubject;
 	rOptions.m_bJoints = rOptions.m_bAxes = rOptions.m_bTargets = true;
+	rOptions.m_bMarkers = false;
 	drawing.Options().m_SolvingSubject = rOptions;
 	return drawing;
 }
@@ -183,12 +185,13 @@ void SubjectsWindow(benchmark::State& io_rState)
 	const auto pScene = MakeScene(Segments(io_rState));
 	auto* const pItem = new OrlexGraphics::VSceneFramebufferObject;
 	pItem->SetScene(pScene.get());
-	for (const char* pName : {"-Enabled", "-Joints", "-Axes", "-Targets"})
+	for (const char* pName : {"-Enabled", "-Joints", "-Axes", "-Targets", "-Markers"})
 		for (const char* pKind : {"LabellingSubject", "SolvingSubject"})
 		{
 			const QString key = QString(pKind) + pName;
-			pItem->GetSceneOptions()->insert(key, true);
-			pItem->OnSceneOptionsMapChanged(key, true);
+			const bool bShown = std::string_view(pName) != "-Markers";
+			pItem->GetSceneOptions()->insert(key, bShown);
+			pItem->OnSceneOptionsMapChanged(key, bShown);
 		}
 	MeasureWindow(io_rState, pItem, pScene.get());
 }
@@ -203,7 +206,7 @@ BENCHMARK(SubjectsFrame)->Apply(Subjects);
 BENCHMARK(SubjectsHoverPick)->Apply(Subjects);
 BENCHMARK(SubjectsUpdate)->Apply(Subjects);
 // It holds no segments: its argument says which window it stands beside.
-BENCHMARK(EmptyWindow)->Arg(70)->MeasureProcessCPUTime()->Unit(benchmark::kMicrosecond);
+BENCHMARK(EmptyWindow)->Apply(Subjects);
 BENCHMARK(SubjectsWindow)->Apply(Subjects);
 
 } // namespace
@@ -214,6 +217,7 @@ int main(int i_Count, char** i_ppArguments)
 	qputenv("QSG_RENDER_LOOP", "basic");
 	qputenv("QT_QPA_UPDATE_IDLE_TIME", "0");
 	return Frames::Main(i_Count, i_ppArguments,
-	    {{"SubjectsFrame", "ClearedFrame", 10.0}, {"SubjectsHoverPick", "ClearedFrame", 2.0},
-	        {"SubjectsWindow", "EmptyWindow", 1.5}});
+	    {{"SubjectsFrame", "ClearedFrame", 2.5, {"70"}}, {"SubjectsFrame", "ClearedFrame", 4.0, {"300"}},
+	        {"SubjectsHoverPick", "ClearedFrame", 0.25, {"70"}}, {"SubjectsHoverPick", "ClearedFrame", 0.7, {"300"}},
+	        {"SubjectsWindow", "EmptyWindow", 1.25, {"70"}}, {"SubjectsWindow", "EmptyWindow", 1.5, {"300"}}});
 }

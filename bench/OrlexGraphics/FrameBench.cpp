@@ -1,16 +1,22 @@
+#include "../../tests/Matrices.h"
 #include "../Frames.h"
 
 #include "CoreGraphics/ShaderLibrary.h"
+#include "CoreGraphics/Skin.h"
+#include "CoreGraphics/SkinInstance.h"
 #include "Flow2Graphics/FlowScene.h"
 #include "InMemoryHost/Dispatcher.h"
 #include "InMemoryHost/Selection.h"
 #include "OrlexGraphics/frame/IRenderType.h"
 #include "OrlexGraphics/picking/SelectionRegistry.h"
+#include "OrlexGraphics/skins/SkinRenderer.h"
 #include "OrlexGraphics/stage/SphereHelper.h"
 
+#include <chrono>
 #include <cmath>
 
-// What a frame and a pick cost without a window, beside a frame that only clears.
+// What a frame and a pick cost without a window, beside a frame that only clears; and how long a frame with two skins
+// takes while the camera turns.
 
 namespace
 {
@@ -54,6 +60,89 @@ private:
 	std::vector<CoreGraphics::VSelectionId> m_Ids;
 };
 
+constexpr std::size_t c_SkinBones = 50;
+constexpr std::size_t c_RingVertices = 80;
+
+/// A tube along Z, as high as a person, of 20,000 vertices with four bones each.
+FBXIO::VSkin MakeTube()
+{
+	FBXIO::VSkin skin;
+	auto pSkeleton = std::make_shared<FBXIO::VSkinSkeleton>(c_SkinBones);
+	for (std::size_t i = 0; i < c_SkinBones; ++i)
+	{
+		(*pSkeleton)[i].m_Name = "bone" + std::to_string(i);
+		(*pSkeleton)[i].m_ParentIndex = std::int64_t(i) - 1;
+	}
+	skin.m_pSkeleton = std::move(pSkeleton);
+	FBXIO::VSkinMesh& rMesh = skin.m_Meshes.emplace_back();
+	rMesh.m_Vertices.resize(20000);
+	const std::size_t rings = rMesh.m_Vertices.size() / c_RingVertices;
+	std::vector<std::uint16_t> indices;
+	for (std::size_t i = 0; i < rMesh.m_Vertices.size(); ++i)
+	{
+		const std::size_t ring = i / c_RingVertices;
+		const float angle = 6.2831853f * float(i % c_RingVertices) / float(c_RingVertices);
+		FBXIO::VSkinVertex& rVertex = rMesh.m_Vertices[i];
+		rVertex.m_Normal = {std::cos(angle), std::sin(angle), 0.0f};
+		rVertex.m_Position = {250 * rVertex.m_Normal[0], 250 * rVertex.m_Normal[1], 1800 * float(ring) / float(rings)};
+		const auto bone = std::uint8_t(ring * (c_SkinBones - 4) / rings);
+		rVertex.m_BoneIndices = {bone, std::uint8_t(bone + 1), std::uint8_t(bone + 2), std::uint8_t(bone + 3)};
+		rVertex.m_BoneWeights = {100, 80, 50, 25};
+		if (ring + 1 == rings)
+			continue;
+		const std::size_t next = i % c_RingVertices + 1 == c_RingVertices ? i + 1 - c_RingVertices : i + 1;
+		for (const std::size_t corner : {i, next, next + c_RingVertices, i, next + c_RingVertices, i + c_RingVertices})
+			indices.push_back(std::uint16_t(corner));
+	}
+	FBXIO::VMeshPart& rPart = rMesh.m_Parts.emplace_back();
+	rPart.m_Indices = CoreGraphics::BytesOf(indices);
+	return skin;
+}
+
+/// Two skins beside each other.
+class VSkins : public OrlexGraphics::IRenderType
+{
+public:
+	explicit VSkins(CoreGraphics::VShaderLibrary& io_rLibrary) : m_Renderer(io_rLibrary)
+	{
+		const auto pSkin = std::make_shared<CoreGraphics::VSkin>(MakeTube(), "bench");
+		std::vector<std::string> names;
+		for (std::size_t i = 0; i < c_SkinBones; ++i)
+			names.push_back("bone" + std::to_string(i));
+		for (std::size_t i = 0; i < m_Skins.size(); ++i)
+		{
+			m_Skins[i].Bind(pSkin, names, std::vector<QVector3D>(c_SkinBones));
+			QMatrix4x4 pose;
+			pose.translate(i == 0 ? -500.0f : 500.0f, 0.0f);
+			m_Skins[i].UpdatePose(std::vector<QMatrix4x4>(c_SkinBones, pose));
+		}
+	}
+
+	void Render(CoreGraphics::VRenderContext& io_rContext, const OrlexGraphics::VSceneOptions& i_rOptions,
+	    std::uint32_t i_Pass) override
+	{
+		if (m_Renderer.BeginRender(io_rContext, i_rOptions.m_SolvingSubject, i_Pass))
+			for (const CoreGraphics::VSkinInstance& rSkin : m_Skins)
+				m_Renderer.Draw(rSkin, io_rContext, i_rOptions.m_SolvingSubject, {});
+	}
+
+private:
+	OrlexGraphics::VSkinRenderer m_Renderer;
+	std::array<CoreGraphics::VSkinInstance, 2> m_Skins;
+};
+
+class VSkinScene : public Flow2Graphics::VFlowScene
+{
+public:
+	using VFlowScene::VFlowScene;
+
+	void InitialiseGL() override
+	{
+		VFlowScene::InitialiseGL();
+		m_RenderList.push_back(std::make_shared<VSkins>(*m_pShaderLibrary));
+	}
+};
+
 class VScene : public Flow2Graphics::VFlowScene
 {
 public:
@@ -92,6 +181,31 @@ Frames::VDrawing MakeDrawing(int i_Count, std::uint32_t i_Selected = 0)
 	return Frames::VDrawing(pScene);
 }
 
+/// Frames on the floor, each from another side.
+class VTurningSkins
+{
+public:
+	VTurningSkins()
+	{
+		m_Drawing.Options().m_bFloorGrid = true;
+		m_Drawing.Camera().m_Distance = 3000.0f;
+		m_Drawing.Camera().m_Centre = {0.0f, 0.0f, 900.0f};
+		m_Drawing.Update();
+		Frame();
+	}
+
+	void Frame()
+	{
+		m_Drawing.Camera().m_Yaw += 1.0f;
+		m_Drawing.Draw();
+	}
+
+private:
+	Frames::VDrawing m_Drawing{std::make_shared<VSkinScene>(std::make_shared<CoreGraphics::VShaderLibrary>(),
+	    std::make_shared<InMemoryHost::VSelectionManager>(), nullptr, std::make_shared<InMemoryHost::VDispatcher>(),
+	    false)};
+};
+
 int Count(const benchmark::State& i_rState)
 {
 	return static_cast<int>(i_rState.range(0));
@@ -129,6 +243,26 @@ void RectanglePick(benchmark::State& io_rState)
 	MakeDrawing(Count(io_rState)).MeasurePicks(io_rState, true);
 }
 
+void TurningSkins(benchmark::State& io_rState)
+{
+	VTurningSkins skins;
+	for (auto _ : io_rState)
+		skins.Frame();
+}
+
+void TellTurningSkins()
+{
+	VTurningSkins skins;
+	std::vector<double> times;
+	for (int i = 0; i < Ratios::c_Pairs; ++i)
+	{
+		const auto before = std::chrono::steady_clock::now();
+		skins.Frame();
+		times.push_back(std::chrono::duration<double, std::milli>(std::chrono::steady_clock::now() - before).count());
+	}
+	Verdict::Tell("a frame with two skins while the camera turns, ms", "", "20,000 vertices", times, 50.0);
+}
+
 void Items(benchmark::internal::Benchmark* io_pBenchmark)
 {
 	io_pBenchmark->Arg(140)->Arg(1400)->MeasureProcessCPUTime()->Unit(benchmark::kMicrosecond);
@@ -140,12 +274,19 @@ BENCHMARK(Frame)->Apply(Items);
 BENCHMARK(OutlinedFrame)->Apply(Items);
 BENCHMARK(HoverPick)->Apply(Items);
 BENCHMARK(RectanglePick)->Apply(Items);
+BENCHMARK(TurningSkins)->MeasureProcessCPUTime()->Unit(benchmark::kMicrosecond);
 
 } // namespace
 
 int main(int i_Count, char** i_ppArguments)
 {
+	const bool bVerdict = Verdict::WasAskedFor(i_Count, i_ppArguments);
 	return Frames::Main(i_Count, i_ppArguments,
 	    {{"HoverPick", "ClearedFrame", 2.0}, {"Frame", "ClearedFrame", 10.0}, {"OutlinedFrame", "ClearedFrame", 10.0},
-	        {"FloorFrame", "ClearedFrame", 10.0}});
+	        {"FloorFrame", "ClearedFrame", 10.0}},
+	    [bVerdict]
+	    {
+		    if (bVerdict)
+			    TellTurningSkins();
+	    });
 }

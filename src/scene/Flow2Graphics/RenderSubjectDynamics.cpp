@@ -176,11 +176,16 @@ CoreGraphics::VShapeBatch& VRenderSubjectDynamics::BatchOf(const VWalk& i_rWalk,
 	return i_rWalk.m_bPick ? m_IdBatch : io_rStep.m_Batches[i_rWalk.m_Class][i_rWalk.m_Pass];
 }
 
+bool VRenderSubjectDynamics::IsLeftOut(const VWalk& i_rWalk, const CoreGraphics::VSelectionId& i_rId) const
+{
+	return i_rWalk.m_bPick && (i_rId.m_Id == 0 || m_pRegistry->IsHidden(i_rId, i_rWalk.m_rContext.m_Mode));
+}
+
 template <typename TPlace>
 bool VRenderSubjectDynamics::Gather(const VWalk& i_rWalk, VStep& io_rStep, const CoreGraphics::VShape& i_rShape,
     const TPlace& i_rPlace, const QVector4D& i_rColour, const CoreGraphics::VSelectionId& i_rId)
 {
-	if (i_rWalk.m_bPick && (i_rId.m_Id == 0 || m_pRegistry->IsHidden(i_rId, i_rWalk.m_rContext.m_Mode)))
+	if (IsLeftOut(i_rWalk, i_rId))
 		return false;
 	BatchOf(i_rWalk, io_rStep)
 	    .Add(i_rShape, i_rPlace,
@@ -262,19 +267,21 @@ void VRenderSubjectDynamics::RenderSpheres(const VWalk& i_rWalk,
 
 void VRenderSubjectDynamics::RenderRotationTargets(const VWalk& i_rWalk)
 {
-	for (const bool bThin : {false, true})
-		for (const std::size_t part : {0u, 1u})
-			for (const auto& rpSubject : i_rWalk.m_rSubjects)
-				for (const VRenderSubjectData::VRotationTarget& rTarget : rpSubject->m_RotationTargets)
+	for (const auto& rpSubject : i_rWalk.m_rSubjects)
+		for (const VRenderSubjectData::VRotationTarget& rTarget : rpSubject->m_RotationTargets)
+		{
+			if (IsLeftOut(i_rWalk, rTarget.m_Id))
+				continue;
+			const bool bThin = IsThin(i_rWalk.m_rContext, rTarget);
+			for (std::size_t axis = 0; axis < m_ArrowParts.size(); ++axis)
+				for (const std::size_t part : {0u, 1u})
 				{
-					if (IsThin(i_rWalk.m_rContext, rTarget) != bThin)
-						continue;
 					// The shaft shows where the target is, the head where the segment is.
 					const QMatrix4x4& rFrame = part == 0 ? rTarget.m_Target : rTarget.m_Segment;
-					for (std::size_t axis = 0; axis < m_ArrowParts.size(); ++axis)
-						Gather(i_rWalk, m_Arrows, m_ArrowShapes[bThin][part], rFrame * m_ArrowParts[axis][part],
-						    c_AxisColours[axis], rTarget.m_Id);
+					Gather(i_rWalk, m_Arrows, m_ArrowShapes[bThin][part], rFrame * m_ArrowParts[axis][part],
+					    c_AxisColours[axis], rTarget.m_Id);
 				}
+		}
 	Draw(i_rWalk, m_Arrows);
 }
 

@@ -94,10 +94,12 @@ private:
 	void RenderMissingMarkers(const VWalk& i_rWalk);
 	void RenderAxes(const VWalk& i_rWalk);
 
+	/// Whether the pick is not to see it.
+	bool IsLeftOut(const VWalk& i_rWalk, const CoreGraphics::VSelectionId& i_rId) const;
 	/// Where the walk gathers what a step draws.
 	CoreGraphics::VShapeBatch& BatchOf(const VWalk& i_rWalk, VStep& io_rStep);
 	/// @param i_rPlace a matrix, or a place and a scale
-	/// @return false if the element is hidden from the pick.
+	/// @return false if it is left out.
 	template <typename TPlace>
 	bool Gather(const VWalk& i_rWalk, VStep& io_rStep, const CoreGraphics::VShape& i_rShape, const TPlace& i_rPlace,
 	    const QVector4D& i_rColour, const CoreGraphics::VSelectionId& i_rId);

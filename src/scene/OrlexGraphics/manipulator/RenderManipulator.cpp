@@ -1,9 +1,8 @@
 #include "OrlexGraphics/manipulator/RenderManipulator.h"
 
 #include "CoreGraphics/RenderContext.h"
-#include "CoreGraphics/SelectableProgram.h"
 #include "CoreGraphics/ShaderLibrary.h"
-#include "CoreGraphics/Shapes.h"
+#include "CoreGraphics/ShapeBatch.h"
 #include "OrlexGraphics/frame/SceneOptions.h"
 #include "OrlexGraphics/manipulator/HandleSize.h"
 #include "OrlexGraphics/manipulator/MeshFile.h"
@@ -70,19 +69,18 @@ NVX::ISelectionItem HandleItem(const VManipulatorHandle& i_rHandle)
 struct VRenderManipulator::VDrawing
 {
 	explicit VDrawing(CoreGraphics::VShaderLibrary& io_rLibrary)
-	    : m_Program(CoreGraphics::VSelectableProgram::Make(io_rLibrary, "Simple3DModelColour", "Colour")),
-	      m_Cylinder(CoreGraphics::MakeCylinder(c_Sides, true)), m_Cone(CoreGraphics::MakeCone(c_Sides, true)),
-	      m_Ring(ReadMeshFile(io_rLibrary, "ManipulatorRing.fbx"))
+	    : m_pProgram(io_rLibrary.GetProgram("Placed", "Colour")), m_Cylinder(CoreGraphics::MakeCylinder(c_Sides, true)),
+	      m_Cone(CoreGraphics::MakeCone(c_Sides, true)), m_Ring(ReadMeshFile(io_rLibrary, "ManipulatorRing.fbx"))
 	{
 	}
 
-	CoreGraphics::VSelectableProgram m_Program;
+	const std::shared_ptr<CoreGraphics::VShaderProgram> m_pProgram;
 	VShape m_Cylinder;
 	VShape m_Cone;
 	/// Empty if its file cannot be read.
 	std::optional<VShape> m_Ring;
-	CoreGraphics::VUniform m_Model{"u_ModelTransform"};
-	CoreGraphics::VUniform m_Colour{"u_ModelColour"};
+	/// Of the picture, and of the pick.
+	std::array<CoreGraphics::VShapeBatch, 2> m_Batches;
 };
 
 VRenderManipulator::VRenderManipulator(CoreGraphics::VShaderLibrary& io_rLibrary,
@@ -204,47 +202,46 @@ void VRenderManipulator::Render(VRenderContext& io_rContext, const VSceneOptions
 	if (!pixelSize)
 		return;
 	const bool bPick = io_rContext.m_Mode == CoreGraphics::ERenderPick;
-	if (!io_rContext.UseProgram(m_pDrawing->m_Program.Get(bPick)))
-		return;
-	io_rContext.ApplyState(bPick ? CoreGraphics::MakeSelectionState(HandleState()) : HandleState());
+	CoreGraphics::VShapeBatch& rBatch = m_pDrawing->m_Batches[bPick];
+	rBatch.Clear();
 	const float size = i_rOptions.m_ManipulatorScale * *pixelSize;
 	for (std::uint32_t axis = 0; axis < 3; ++axis)
-		RenderAxis(io_rContext, axis, size);
+		GatherAxis(rBatch, bPick, axis, size);
+	if (rBatch.IsEmpty() || !io_rContext.UseProgram(m_pDrawing->m_pProgram))
+		return;
+	io_rContext.ApplyState(bPick ? CoreGraphics::MakeSelectionState(HandleState()) : HandleState());
+	rBatch.Draw(io_rContext, GL_TRIANGLES);
 }
 
-void VRenderManipulator::RenderAxis(VRenderContext& io_rContext, std::uint32_t i_Axis, float i_Size)
+void VRenderManipulator::GatherAxis(
+    CoreGraphics::VShapeBatch& io_rBatch, bool i_bPick, std::uint32_t i_Axis, float i_Size)
 {
 	VDrawing& rDrawing = *m_pDrawing;
 	const QMatrix4x4 frame = m_Drawn.m_Transform * AxisRotation(i_Axis);
-	const bool bPick = io_rContext.m_Mode == CoreGraphics::ERenderPick;
+	CoreGraphics::VColourBytes colour;
 
-	/// The group's id or colour; false for a group that is not drawn.
+	/// Takes the group's id or colour; false for a group that is not drawn.
 	const auto begin = [&](std::uint32_t i_Group)
 	{
 		if (!HasGroup(m_Drawn, i_Group))
 			return false;
 		const CoreGraphics::VSelectionId& rId = IdOf(i_Group, i_Axis);
-		if (bPick && m_pRegistry->IsHidden(rId, io_rContext.m_Mode))
+		if (i_bPick && m_pRegistry->IsHidden(rId, CoreGraphics::ERenderPick))
 			return false;
-		if (bPick)
-			rDrawing.m_Program.SetId(io_rContext, rId);
-		else
-			io_rContext.SetUniform(rDrawing.m_Colour,
-			    (rId.m_Id & (CoreGraphics::ESelectionIdSelected | CoreGraphics::ESelectionIdPreselected)) != 0
-			        ? c_HighlightColour
-			        : c_AxisColours[i_Axis]);
+		const bool bHighlight =
+		    (rId.m_Id & (CoreGraphics::ESelectionIdSelected | CoreGraphics::ESelectionIdPreselected)) != 0;
+		colour = i_bPick ? CoreGraphics::ColourBytes(rId)
+		                 : CoreGraphics::ColourBytes(bHighlight ? c_HighlightColour : c_AxisColours[i_Axis]);
 		return true;
 	};
 	/// A shape at a place of the axis' frame, in pixels.
-	const auto draw = [&](VShape& io_rShape, const QMatrix4x4& i_rPlace, const QVector3D& i_rScale)
+	const auto add = [&](const VShape& i_rShape, const QMatrix4x4& i_rPlace, const QVector3D& i_rScale)
 	{
 		QMatrix4x4 model = frame;
 		model.scale(i_Size);
 		model *= i_rPlace;
 		model.scale(i_rScale);
-		io_rContext.SetUniform(rDrawing.m_Model, model);
-		io_rContext.BindVertices(io_rShape.m_Vertices);
-		io_rContext.DrawElements(GL_TRIANGLES, io_rShape.m_Indices);
+		io_rBatch.Add(i_rShape, model, colour);
 	};
 	const auto at = [](float i_X, float i_Y, float i_Z)
 	{
@@ -256,8 +253,8 @@ void VRenderManipulator::RenderAxis(VRenderContext& io_rContext, std::uint32_t i
 
 	if (begin(EManipulatorArrow))
 	{
-		draw(rDrawing.m_Cylinder, at(0.0f, 0.0f, c_ShaftGap), QVector3D(c_ShaftRadius, c_ShaftRadius, c_ShaftLength));
-		draw(rDrawing.m_Cone, at(0.0f, 0.0f, c_ShaftLength + c_ShaftGap), head);
+		add(rDrawing.m_Cylinder, at(0.0f, 0.0f, c_ShaftGap), QVector3D(c_ShaftRadius, c_ShaftRadius, c_ShaftLength));
+		add(rDrawing.m_Cone, at(0.0f, 0.0f, c_ShaftLength + c_ShaftGap), head);
 	}
 	if (begin(EManipulatorPlane))
 	{
@@ -265,15 +262,15 @@ void VRenderManipulator::RenderAxis(VRenderContext& io_rContext, std::uint32_t i
 		const float x = i_Axis == 0 ? -c_PlaneOffset : c_PlaneOffset;
 		const float y = i_Axis == 1 ? -c_PlaneOffset : c_PlaneOffset;
 		const QVector3D side(c_ShaftRadius, c_ShaftRadius, c_PlaneOffset);
-		draw(rDrawing.m_Cylinder, at(std::min(x, 0.0f), y, 0.0f) * AxisRotation(0), side);
-		draw(rDrawing.m_Cylinder, at(x, std::min(y, 0.0f), 0.0f) * AxisRotation(1), side);
+		add(rDrawing.m_Cylinder, at(std::min(x, 0.0f), y, 0.0f) * AxisRotation(0), side);
+		add(rDrawing.m_Cylinder, at(x, std::min(y, 0.0f), 0.0f) * AxisRotation(1), side);
 	}
 	if (rDrawing.m_Ring && begin(EManipulatorRing))
-		draw(*rDrawing.m_Ring, QMatrix4x4(), QVector3D(c_RingRadius, c_RingRadius, c_RingRadius));
-	if (!bPick && m_Drawn.m_Dragged && m_Drawn.m_Dragged->m_Axis == i_Axis)
+		add(*rDrawing.m_Ring, QMatrix4x4(), QVector3D(c_RingRadius, c_RingRadius, c_RingRadius));
+	if (!i_bPick && m_Drawn.m_Dragged && m_Drawn.m_Dragged->m_Axis == i_Axis)
 	{
-		io_rContext.SetUniform(rDrawing.m_Colour, c_MarkerColour);
-		draw(rDrawing.m_Cone, at(0.0f, 0.0f, c_MarkerOffset), head);
+		colour = CoreGraphics::ColourBytes(c_MarkerColour);
+		add(rDrawing.m_Cone, at(0.0f, 0.0f, c_MarkerOffset), head);
 	}
 }
 

@@ -17,7 +17,8 @@
 namespace CoreGraphics
 {
 class VShaderLibrary;
-}
+class VShapeBatch;
+} // namespace CoreGraphics
 
 namespace TesselPluginInterface
 {
@@ -96,7 +97,7 @@ private:
 	static bool HasGroup(const VState& i_rState, std::uint32_t i_Group);
 	std::optional<VManipulatorHandle> HoveredHandle() const;
 	const CoreGraphics::VSelectionId& IdOf(std::uint32_t i_Group, std::uint32_t i_Axis) const;
-	void RenderAxis(CoreGraphics::VRenderContext& io_rContext, std::uint32_t i_Axis, float i_Size);
+	void GatherAxis(CoreGraphics::VShapeBatch& io_rBatch, bool i_bPick, std::uint32_t i_Axis, float i_Size);
 
 	const std::shared_ptr<VSelectionRegistry> m_pRegistry;
 	const std::shared_ptr<TesselPluginInterface::ISelectionManager> m_pSelectionManager;
