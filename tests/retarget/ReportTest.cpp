@@ -37,7 +37,7 @@ TEST(Report, TellsTheSetUp)
 	for (const char* const pShown : {"&lt;script&gt;[U+202E]", "Retarget subject &lt;i&gt;&amp;#10;.qrr",
 	         "<bdi>Hips</bdi></td><td class=\"n\"><bdi>1</bdi></td><td class=\"n\"><bdi>3.0, 4.0, 0.0 mm</bdi>",
 	         "<bdi>upper arm</bdi>", "<bdi>LeftHandThumb2</bdi></td><td><bdi>go</bdi>",
-	         "Range of motion: ", "Pictures were not asked for"})
+	         "No range of motion: no target follows a segment", "Pictures were not asked for"})
 		EXPECT_NE(page.find(pShown), std::string::npos) << pShown;
 	EXPECT_EQ(folder.Run(report).m_Out, page);
 
