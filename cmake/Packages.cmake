@@ -38,7 +38,7 @@ install(DIRECTORY ${PROJECT_SOURCE_DIR}/examples/batch DESTINATION ${CMAKE_INSTA
 # What is loaded at run time is not seen by dpkg-shlibdeps: LAPACK, and the toolkit's QML modules.
 set(loaded liblapacke)
 set(window)
-set(headers libboost-filesystem-dev libboost-regex-dev libboost-system-dev libboost-thread-dev libdeflate-dev nettle-dev)
+set(headers libboost-filesystem-dev libboost-regex-dev libboost-system-dev libdeflate-dev nettle-dev)
 if(RETARGET_QT)
 	file(STRINGS ${PROJECT_SOURCE_DIR}/setup/packages modules REGEX "^build .*qml-module-")
 	string(REGEX MATCHALL "qml-module-[a-z0-9-]+" modules "${modules}")

@@ -51,14 +51,15 @@ if(RETARGET_SANITIZE MATCHES "address,undefined")
 endif()
 
 # What ships stands harder against a file that finds a fault in it: an overrun ends the program before it is obeyed.
-# docs/performance.md tells what that costs; the folders that compute without pause do not look at each index.
+# docs/performance.md tells what that costs; the folders that compute without pause do not look at each index. For
+# Windows the linker does what there is to do, unasked.
 option(RETARGET_HARDENED "Harden what is built as Release" ON)
 set(RETARGET_HARDENING "-U_FORTIFY_SOURCE -D_FORTIFY_SOURCE=3 -fstack-protector-strong -fstack-clash-protection")
 if(CMAKE_SYSTEM_PROCESSOR MATCHES "x86_64|AMD64")
 	string(APPEND RETARGET_HARDENING " -fcf-protection")
 endif()
 set(RETARGET_HOT_FOLDERS "^src/(base/(math|numerics)|kinematics)/?")
-if(NOT CMAKE_BUILD_TYPE STREQUAL "Release")
+if(NOT CMAKE_BUILD_TYPE STREQUAL "Release" OR WIN32)
 	set(RETARGET_HARDENED OFF)
 endif()
 if(RETARGET_HARDENED)
@@ -121,7 +122,8 @@ find_program(RETARGET_GZIP gzip REQUIRED)
 function(retarget_manual program)
 	# What a program leaves behind in memory is looked for by its tests.
 	add_custom_command(OUTPUT ${program}.1.gz
-		COMMAND ${CMAKE_COMMAND} -E env ASAN_OPTIONS=detect_leaks=0 $<TARGET_FILE:${program}> ${ARGN} > ${program}.1
+		COMMAND ${CMAKE_COMMAND} -E env ASAN_OPTIONS=detect_leaks=0
+			${CMAKE_CROSSCOMPILING_EMULATOR} $<TARGET_FILE:${program}> ${ARGN} > ${program}.1
 		COMMAND ${RETARGET_GZIP} -9nf ${program}.1
 		DEPENDS ${program} VERBATIM)
 	add_custom_target(${program}_manual ALL DEPENDS ${program}.1.gz)

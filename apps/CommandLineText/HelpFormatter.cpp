@@ -1,8 +1,8 @@
 #include "CommandLineText/HelpFormatter.h"
 
+#include "CommandLineText/System.h"
+
 #include <algorithm>
-#include <sys/ioctl.h>
-#include <unistd.h>
 
 namespace CommandLine
 {
@@ -21,12 +21,6 @@ std::string Entry(const std::string& i_rName, const std::string& i_rText)
 }
 
 } // namespace
-
-std::size_t TerminalWidth()
-{
-	winsize size{};
-	return isatty(STDOUT_FILENO) && ::ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) == 0 ? size.ws_col : 0;
-}
 
 std::size_t TextWidth()
 {

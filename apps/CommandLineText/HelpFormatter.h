@@ -5,9 +5,6 @@
 namespace CommandLine
 {
 
-/// Columns of the terminal; 0 where standard output is none.
-std::size_t TerminalWidth();
-
 /// Columns that help may take: those of the terminal, at most 100.
 std::size_t TextWidth();
 

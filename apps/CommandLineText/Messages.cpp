@@ -2,6 +2,7 @@
 
 #include "CommandLineText/ProgressBar.h"
 #include "CommandLineText/Suggest.h"
+#include "CommandLineText/System.h"
 #include "CommandLineText/VisibleText.h"
 
 #include <nlohmann/json.hpp>
@@ -12,7 +13,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <fcntl.h>
 #include <mutex>
 #include <string_view>
 #include <unistd.h>
@@ -215,7 +215,7 @@ void KeepMessages(const std::string& i_rFile)
 {
 	if (!i_rFile.ends_with(".log"))
 		throw VCommandError(EWrongUsage, "--log-file: \"" + i_rFile + "\" does not end in .log");
-	const int descriptor = open(i_rFile.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0666);
+	const int descriptor = OpenToAppend(i_rFile);
 	if (descriptor < 0)
 		throw VCommandError(EBadOutput, "\"" + i_rFile + "\" cannot be written: " + std::strerror(errno));
 	if (const int before = LogDescriptor().exchange(descriptor); before >= 0)

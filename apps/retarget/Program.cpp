@@ -123,6 +123,8 @@ VProgram MakeProgram(const VRender& i_rRender)
 	rApp.footer(c_pWalkThrough);
 	rApp.require_subcommand(0, 1);
 	rApp.allow_extras();
+	// A word that begins with a slash is a path, on every system.
+	rApp.allow_windows_style_options(false);
 	const auto addRender = [&](CLI::App& io_rProgram) { return AddRenderCommand(io_rProgram, i_rRender); };
 	const auto addReport = [&](CLI::App& io_rProgram) { return AddReportCommand(io_rProgram, i_rRender); };
 	using VAdd = std::function<VCommand(CLI::App&)>;

@@ -1,8 +1,9 @@
 #include "UtilsRapidXml/ReaderNode.h"
 #include "UtilsRapidXml/Limits.h"
 
-#include <boost/thread/thread.hpp>
 #include <gtest/gtest.h>
+
+#include <pthread.h>
 
 namespace
 {
@@ -210,29 +211,40 @@ TEST(ReaderNode, WalksTheDeepestFileOnASmallStack)
 	for (std::size_t i = 0; i < c_MaximumDepth; ++i)
 		text += "</r>";
 	std::size_t visited = 0;
-	boost::thread::attributes attributes;
+	pthread_attr_t attributes;
+	pthread_attr_init(&attributes);
 #ifdef NDEBUG
-	attributes.set_stack_size(512 << 10);
+	pthread_attr_setstacksize(&attributes, 512 << 10);
 #else
 	// Frames that are not optimised, or watched by a sanitizer, take several times as much.
-	attributes.set_stack_size(4096 << 10);
+	pthread_attr_setstacksize(&attributes, 4096 << 10);
 #endif
-	boost::thread thread(attributes,
-	    [&]
-	    {
-		    VDocument document;
-		    std::string error;
-		    ASSERT_TRUE(document.Parse(text, error)) << error;
-		    VReaderNode root(document, true);
-		    std::function<void(INode&)> format = [&](INode& io_rNode)
-		    {
-			    ++visited;
-			    io_rNode.DeclareElement("r", "", 0, 1);
-			    io_rNode.ProcessElements(format);
-		    };
-		    format(root);
-	    });
-	thread.join();
+	std::function<void()> walk = [&]
+	{
+		VDocument document;
+		std::string error;
+		ASSERT_TRUE(document.Parse(text, error)) << error;
+		VReaderNode root(document, true);
+		std::function<void(INode&)> format = [&](INode& io_rNode)
+		{
+			++visited;
+			io_rNode.DeclareElement("r", "", 0, 1);
+			io_rNode.ProcessElements(format);
+		};
+		format(root);
+	};
+	pthread_t thread;
+	ASSERT_EQ(pthread_create(
+	              &thread, &attributes,
+	              [](void* i_pWalk) -> void*
+	              {
+		              (*static_cast<std::function<void()>*>(i_pWalk))();
+		              return nullptr;
+	              },
+	              &walk),
+	    0);
+	pthread_join(thread, nullptr);
+	pthread_attr_destroy(&attributes);
 	EXPECT_EQ(visited, c_MaximumDepth + 1);
 }
 

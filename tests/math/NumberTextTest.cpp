@@ -8,6 +8,8 @@
 #include <cstdio>
 #include <limits>
 #include <random>
+#include <string>
+#include <utility>
 
 namespace
 {
@@ -59,6 +61,24 @@ TEST_F(NumberText, ScansWhatTheLibraryScans)
 	        "2ex", "1e400", "-1e400", "1e-400", "4e-320", "1,5", "0x10", "0x", "0x.8p1", "0x1p-1080", "0x1p5000",
 	        "0x1p", "inf", "INFINITY", "infinit", "infx", "nan", "-NaN", "na", "1e5000000000", "00012", "-0"})
 		ExpectSameScan(pText);
+}
+
+/// Also where the C library takes no such texts.
+TEST_F(NumberText, ReadsWhatIsOutOfRangeAsInfiniteOrZero)
+{
+	const std::string zeros(400, '0');
+	const std::pair<std::string, double> c_Rows[] = {{"0x1p5000", HUGE_VAL}, {"-0x1p5000", -HUGE_VAL},
+	    {"0x1p-1075", 0.0}, {"0x1.8p-1075", 0x1p-1074}, {"0x1p-5000", 0.0}, {"1e400", HUGE_VAL}, {"1e+400", HUGE_VAL},
+	    {"-1e-400", -0.0}, {"1" + zeros, HUGE_VAL}, {"1" + zeros + "e-400", 1.0}, {"0." + zeros + "1", 0.0},
+	    {"0." + zeros + "1e401", 1.0}, {"0." + zeros + "1e5", 0.0}, {"1" + zeros + ".5e-5", HUGE_VAL},
+	    {"0x1" + zeros + "p-9", HUGE_VAL}, {"0x." + zeros + "1p9", 0.0}, {"1e99999999999999999999", HUGE_VAL},
+	    {"0.1e-99999999999999999999", 0.0}};
+	for (const auto& [text, expected] : c_Rows)
+	{
+		double value = 7.0;
+		EXPECT_EQ(::NumberText::ScanReal(text, value), text.size()) << text;
+		EXPECT_EQ(std::bit_cast<std::uint64_t>(value), std::bit_cast<std::uint64_t>(expected)) << text;
+	}
 }
 
 TEST_F(NumberText, ScansRandomTextAsTheLibraryDoes)

@@ -1,6 +1,6 @@
 """What each verb prints with --json is what docs/results.schema.json promises, and nothing that it does not tell.
 
-    results_test.py RETARGET"""
+    results_test.py RETARGET, which may be several words"""
 
 import json
 import pathlib
@@ -14,7 +14,7 @@ import unittest
 import jsonschema
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
-RETARGET = sys.argv.pop()
+RETARGET, sys.argv[1:] = sys.argv[1:], []
 SCHEMA = json.loads((ROOT / "docs/results.schema.json").read_text(encoding="utf8"))
 KENNEY = str(ROOT / "tests/data/fbx/kenney_medium_b7400.fbx")
 
@@ -96,7 +96,7 @@ class Results(unittest.TestCase):
                 if "bad.qrr" in arguments:
                     text = pathlib.Path(folder, "k.qrr").read_text(encoding="utf8")
                     pathlib.Path(folder, "bad.qrr").write_text(text.replace('WEIGHT="1"', 'WEIGHT="-1"', 1), encoding="utf8")
-                done = subprocess.run([RETARGET, *arguments, "--json"], cwd=folder, capture_output=True, text=True,
+                done = subprocess.run([*RETARGET, *arguments, "--json"], cwd=folder, capture_output=True, text=True,
                                       check=False)
                 verbs.add(arguments[0])
                 with self.subTest(line):
@@ -106,7 +106,7 @@ class Results(unittest.TestCase):
                     self.assertEqual(untold(result, SCHEMA["$defs"][arguments[0]]), [])
                     for message in done.stderr.splitlines():
                         validator("message").validate(json.loads(message))
-        shown = subprocess.run([RETARGET, "--help"], capture_output=True, text=True, check=True).stdout
+        shown = subprocess.run([*RETARGET, "--help"], capture_output=True, text=True, check=True).stdout
         listed = set(re.findall(r"^  ([a-z]+)  ", shown.partition("Commands:")[2].partition("Messages:")[0], re.M))
         self.assertEqual(verbs | NOT_RUN, listed)
         self.assertLessEqual(listed, set(SCHEMA["$defs"]))

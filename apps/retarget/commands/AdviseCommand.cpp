@@ -1,6 +1,7 @@
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Parsing.h"
+#include "CommandLineText/System.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Advice.h"
 #include "retarget/subject/TargetLines.h"

@@ -1,5 +1,6 @@
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/System.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/TakeFile.h"
 #include "retarget/text/MotionFile.h"

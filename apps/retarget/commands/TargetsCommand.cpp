@@ -1,6 +1,6 @@
-#include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Parsing.h"
+#include "CommandLineText/System.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Residuals.h"
 #include "retarget/subject/Session.h"

@@ -1,5 +1,5 @@
-#include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/System.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/subject/Residuals.h"
 #include "retarget/subject/SubjectFile.h"

@@ -1,5 +1,7 @@
 #include "retarget/picture/Renderer.h"
 
+#include "CommandLineText/System.h"
+
 #include "NVX/Status.h"
 #include "UtilsFileSystem/Files.h"
 #include "UtilsFileSystem/Paths.h"
@@ -10,8 +12,6 @@
 #include <boost/process/args.hpp>
 #include <boost/process/child.hpp>
 #include <boost/process/io.hpp>
-
-#include <sys/wait.h>
 
 namespace CommandLine
 {
@@ -89,7 +89,7 @@ EExitStatus RunRenderer(const std::vector<std::string>& i_rArguments)
 		child.wait(error);
 	if (error)
 		FailToStart(program);
-	if (!WIFEXITED(child.native_exit_code()))
+	if (!HasEndedItself(child.native_exit_code()))
 		throw VCommandError(EBadOutput, c_pCrashed);
 	return static_cast<EExitStatus>(child.exit_code());
 }
@@ -115,7 +115,7 @@ std::string RenderedPicture(const VRenderSettings& i_rSettings)
 		child.wait(error);
 	if (error)
 		FailToStart(program);
-	if (!WIFEXITED(child.native_exit_code()))
+	if (!HasEndedItself(child.native_exit_code()))
 		throw VCommandError(EBadOutput, c_pCrashed);
 	if (child.exit_code() != EFine)
 		throw VCommandError(EBadOutput, LastMessage(ReadIfThere(messages)));

@@ -2,6 +2,7 @@
 
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/System.h"
 #include "retarget/text/Table.h"
 
 #include <cmath>

@@ -1,6 +1,7 @@
 #include "retarget/text/InputFile.h"
 
 #include "CommandLineText/ExitStatus.h"
+#include "CommandLineText/System.h"
 
 #include "UtilsFileSystem/Paths.h"
 
@@ -19,10 +20,10 @@ namespace
 	throw VCommandError(EBadInput, std::string("Standard input could not be read: ") + std::strerror(errno));
 }
 
-/// Open until the process ends, which removes it.
-std::FILE* CopyOfStandardInput(std::uint64_t i_MaximumBytes)
+/// Where it lies until the process ends.
+boost::filesystem::path CopyOfStandardInput(std::uint64_t i_MaximumBytes)
 {
-	std::FILE* const pCopy = std::tmpfile();
+	std::FILE* const pCopy = OpenScratchFile();
 	if (!pCopy)
 		FailToCopy();
 	std::array<char, 65536> bytes;
@@ -34,9 +35,10 @@ std::FILE* CopyOfStandardInput(std::uint64_t i_MaximumBytes)
 		if ((copied += count) > i_MaximumBytes)
 			break;
 	}
-	if (std::ferror(stdin) || std::fflush(pCopy) != 0)
+	const boost::filesystem::path path = FinishScratchFile(pCopy);
+	if (std::ferror(stdin) || path.empty())
 		FailToCopy();
-	return pCopy;
+	return path;
 }
 
 } // namespace
@@ -49,7 +51,7 @@ boost::filesystem::path InputPath(const std::string& i_rWord, std::uint64_t i_Ma
 	if (s_bCopied)
 		throw VCommandError(EWrongUsage, "- is given for more than one file, and standard input holds only one");
 	s_bCopied = true;
-	return "/dev/fd/" + std::to_string(fileno(CopyOfStandardInput(i_MaximumBytes)));
+	return CopyOfStandardInput(i_MaximumBytes);
 }
 
 } // namespace CommandLine

@@ -7,6 +7,7 @@
 #include "NVX/Status.h"
 #include "RetargetSetupCore/FilePath.h"
 #include "UtilsFileSystem/Paths.h"
+#include "UtilsFileSystem/Platform.h"
 #include "UtilsFileSystem/SaveFile.h"
 
 #include <boost/algorithm/string/case_conv.hpp>
@@ -86,7 +87,9 @@ bool BeginsPage(std::string_view i_Head)
 /// False if the file cannot be read.
 bool ReadHead(const boost::filesystem::path& i_rPath, std::string& o_rHead)
 {
-	const std::unique_ptr<std::FILE, int (*)(std::FILE*)> pFile(std::fopen(i_rPath.c_str(), "rb"), std::fclose);
+	int error = 0;
+	const std::unique_ptr<std::FILE, int (*)(std::FILE*)> pFile(
+	    UtilsFileSystem::Platform::Open(i_rPath, "rb", error), std::fclose);
 	if (!pFile)
 		return false;
 	o_rHead.resize(c_HeadSize);

@@ -2,6 +2,7 @@
 
 #include "FileSystemWatcher/DirectoryMonitor.h"
 #include "UtilsFileSystem/Paths.h"
+#include "UtilsFileSystem/Platform.h"
 
 #include <boost/filesystem/operations.hpp>
 #include <boost/system/system_error.hpp>
@@ -15,8 +16,9 @@ namespace FileSystemWatcher
 namespace
 {
 
-/// All that may change: names, attributes, sizes, times, security.
+/// All that may change: names, attributes, sizes, times, security; and extended attributes, which wine refuses.
 constexpr DWORD c_AllChanges = 511;
+constexpr DWORD c_NamedChanges = c_AllChanges & ~0x80u;
 /// Ends the wait; watches count from 1.
 constexpr ULONG_PTR c_StopKey = 0;
 
@@ -39,11 +41,12 @@ struct VRead
 			::CloseHandle(m_Directory);
 	}
 
-	bool Arm()
+	bool Arm() { return Arm(c_AllChanges) || (::GetLastError() == ERROR_INVALID_PARAMETER && Arm(c_NamedChanges)); }
+	bool Arm(DWORD i_Changes)
 	{
 		m_Overlapped = {};
 		return ::ReadDirectoryChangesW(
-		    m_Directory, m_Buffer, sizeof(m_Buffer), FALSE, c_AllChanges, nullptr, &m_Overlapped, nullptr);
+		    m_Directory, m_Buffer, sizeof(m_Buffer), FALSE, i_Changes, nullptr, &m_Overlapped, nullptr);
 	}
 
 	boost::filesystem::path m_Path;
@@ -87,8 +90,8 @@ public:
 	{
 		auto pRead = std::make_unique<VRead>();
 		pRead->m_Path = i_rDirectory;
-		pRead->m_Directory = ::CreateFileW(i_rDirectory.c_str(), FILE_LIST_DIRECTORY,
-		    FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE, nullptr, OPEN_EXISTING,
+		pRead->m_Directory = ::CreateFileW(UtilsFileSystem::Platform::NativePath(i_rDirectory).c_str(),
+		    FILE_LIST_DIRECTORY, FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE, nullptr, OPEN_EXISTING,
 		    FILE_FLAG_BACKUP_SEMANTICS | FILE_FLAG_OVERLAPPED, nullptr);
 		const std::lock_guard lock(m_Mutex);
 		const int watch = ++m_LastWatch;

@@ -5,6 +5,7 @@
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/Platform.h"
 
+#include <boost/filesystem/detail/utf8_codecvt_facet.hpp>
 #include <boost/filesystem/operations.hpp>
 #include <boost/system/error_code.hpp>
 
@@ -13,10 +14,19 @@
 #include <cstdlib>
 #include <cstring>
 #include <iterator>
+#include <locale>
 #include <utility>
 
 namespace UtilsFileSystem
 {
+namespace
+{
+
+/// Boost's default is whatever code page the system was set up with.
+[[maybe_unused]] const std::locale s_Before =
+    boost::filesystem::path::imbue(std::locale(std::locale(), new boost::filesystem::detail::utf8_codecvt_facet));
+
+} // namespace
 
 boost::filesystem::path PathFromUtf8(const std::string& i_rText)
 {

@@ -7,8 +7,6 @@
 #include <cmath>
 #include <cstdint>
 #include <limits>
-#include <locale.h>
-#include <stdlib.h>
 
 namespace
 {
@@ -74,16 +72,23 @@ const char* EndOfNumber(const char* i_pFrom, const char* i_pEnd, TIsDigit i_IsDi
 	return p;
 }
 
-/// The C library's result for a number beyond the range of a double: an infinity, a subnormal or zero.
-double OutOfRange(const std::string& i_rNumber)
+/// What digits [. digits] [exponent] stand for where no double is near: an infinity or zero. C libraries differ there.
+template <typename TIsDigit>
+double OutOfRange(std::string_view i_Number, TIsDigit i_IsDigit, int i_BitsOfDigit)
 {
-#ifdef _WIN32
-	static const _locale_t s_Locale = _create_locale(LC_ALL, "C");
-	return _strtod_l(i_rNumber.c_str(), nullptr, s_Locale);
-#else
-	static const locale_t s_Locale = newlocale(LC_ALL_MASK, "C", nullptr);
-	return strtod_l(i_rNumber.c_str(), nullptr, s_Locale);
-#endif
+	const char* const pEnd = i_Number.data() + i_Number.size();
+	const char* const pPoint = SkipDigits(i_Number.data(), pEnd, i_IsDigit);
+	const char* pExponent = pPoint != pEnd && *pPoint == '.' ? SkipDigits(pPoint + 1, pEnd, i_IsDigit) : pPoint;
+	const char* const pLeading = i_Number.data() + std::min(i_Number.find_first_not_of("0."), i_Number.size());
+	if (pExponent == pEnd)
+		return pLeading < pPoint ? HUGE_VAL : 0.0;
+	pExponent += pExponent[1] == '+' ? 2 : 1;
+	long long exponent = 0;
+	if (std::from_chars(pExponent, pEnd, exponent).ec == std::errc::result_out_of_range)
+		return *pExponent == '-' ? 0.0 : HUGE_VAL;
+	// More text than memory would be needed to come near the exponent's own end.
+	exponent = std::clamp(exponent, -(1LL << 60), 1LL << 60);
+	return exponent + (pPoint - pLeading) * i_BitsOfDigit > 0 ? HUGE_VAL : 0.0;
 }
 
 bool AppendNotFinite(std::string& io_rText, double i_Value)
@@ -221,7 +226,10 @@ std::size_t NumberText::ScanReal(std::string_view i_Text, double& o_rValue)
 	const auto result =
 	    std::from_chars(pNumber, pNumberEnd, value, bHexadecimal ? std::chars_format::hex : std::chars_format::general);
 	if (result.ec == std::errc::result_out_of_range)
-		value = OutOfRange(std::string(p, pNumberEnd));
+	{
+		const std::string_view number(pNumber, pNumberEnd);
+		value = bHexadecimal ? OutOfRange(number, IsHexDigit, 4) : OutOfRange(number, IsDigit, 1);
+	}
 	o_rValue = bNegative ? -value : value;
 	return pNumberEnd - pBegin;
 }

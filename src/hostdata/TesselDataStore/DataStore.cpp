@@ -16,23 +16,30 @@ struct VHold
 	const void* m_pStore = nullptr;
 	std::size_t m_Readers = 0;
 	std::size_t m_Writers = 0;
+	VHold* m_pNext = nullptr;
 };
 
-/// Few: a thread seldom has more than two stores open.
-thread_local std::vector<VHold> t_Holds;
+/// Few: a thread seldom has more than two stores open. A plain pointer, since g++'s runtime on Windows destroys what
+/// belongs to a thread too late; what it points to is gone when nothing is held.
+thread_local VHold* t_pHolds = nullptr;
 
 VHold& HoldOf(const void* i_pStore)
 {
-	const auto found = std::find_if(
-	    t_Holds.begin(), t_Holds.end(), [i_pStore](const VHold& i_rHold) { return i_rHold.m_pStore == i_pStore; });
-	return found != t_Holds.end() ? *found : t_Holds.emplace_back(VHold{i_pStore});
+	for (VHold* pHold = t_pHolds; pHold; pHold = pHold->m_pNext)
+		if (pHold->m_pStore == i_pStore)
+			return *pHold;
+	return *(t_pHolds = new VHold{i_pStore, 0, 0, t_pHolds});
 }
 
 void ForgetIfIdle(const void* i_pStore)
 {
-	std::erase_if(t_Holds,
-	    [i_pStore](const VHold& i_rHold)
-	    { return i_rHold.m_pStore == i_pStore && i_rHold.m_Readers == 0 && i_rHold.m_Writers == 0; });
+	for (VHold** ppHold = &t_pHolds; *ppHold; ppHold = &(*ppHold)->m_pNext)
+		if (VHold* const pHold = *ppHold; pHold->m_pStore == i_pStore && pHold->m_Readers + pHold->m_Writers == 0)
+		{
+			*ppHold = pHold->m_pNext;
+			delete pHold;
+			return;
+		}
 }
 
 bool StandsFor(const std::string& i_rSubscribed, const std::string& i_rKey)

@@ -1,9 +1,11 @@
 #include "CoreGraphics/ResourceRoot.h"
 
+#include "UtilsFileSystem/Paths.h"
+
 #include <QDir>
 #include <QFileInfo>
 
-#include <dlfcn.h>
+#include <boost/dll/runtime_symbol_info.hpp>
 
 namespace CoreGraphics
 {
@@ -13,10 +15,11 @@ namespace
 
 QDir BinaryFolder()
 {
-	Dl_info info{};
-	if (dladdr(reinterpret_cast<const void*>(&FindResourceRoot), &info) == 0 || !info.dli_fname)
+	boost::dll::fs::error_code error;
+	const boost::dll::fs::path binary = boost::dll::symbol_location(FindResourceRoot, error);
+	if (error)
 		return QDir::current();
-	return QFileInfo(QFile::decodeName(info.dli_fname)).canonicalPath();
+	return QFileInfo(QString::fromStdString(UtilsFileSystem::ToUtf8(binary))).canonicalPath();
 }
 
 } // namespace

@@ -6,6 +6,7 @@
 #include <array>
 #include <cmath>
 #include <map>
+#include <numbers>
 #include <utility>
 #include <vector>
 
@@ -76,7 +77,7 @@ VShape MakeWireBox()
 
 QVector3D OnCircle(std::uint32_t i_Step, std::uint32_t i_Steps, float i_Z = 0.0f)
 {
-	const double angle = 2.0 * M_PI * i_Step / i_Steps;
+	const double angle = 2.0 * std::numbers::pi * i_Step / i_Steps;
 	return {static_cast<float>(std::cos(angle)), static_cast<float>(std::sin(angle)), i_Z};
 }
 

@@ -1,6 +1,7 @@
 #include "fbxsdk/container/Arrays.h"
 
 #include "fbxsdk/container/BinaryValues.h"
+#include "fbxsdk/container/Lent.h"
 #include "fbxsdk/container/TextScan.h"
 #include "fbxsdk/container/Values.h"
 
@@ -10,7 +11,6 @@
 #include <charconv>
 #include <cmath>
 #include <limits>
-#include <memory>
 #include <type_traits>
 
 namespace
@@ -26,11 +26,9 @@ bool Decode(const Binary::VArray& i_rArray, void* o_pBytes, std::size_t i_Size)
 		std::memcpy(o_pBytes, i_rArray.m_pBytes, i_Size);
 		return true;
 	}
-	using VDecompressor = std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)>;
-	thread_local const VDecompressor pDecompressor(libdeflate_alloc_decompressor(), &libdeflate_free_decompressor);
-	return pDecompressor
-	    && libdeflate_zlib_decompress(
-	           pDecompressor.get(), i_rArray.m_pBytes, i_rArray.m_Size, o_pBytes, i_Size, nullptr)
+	const VLent<libdeflate_alloc_decompressor, libdeflate_free_decompressor> decompressor;
+	return decompressor.Get()
+	    && libdeflate_zlib_decompress(decompressor.Get(), i_rArray.m_pBytes, i_rArray.m_Size, o_pBytes, i_Size, nullptr)
 	    == LIBDEFLATE_SUCCESS;
 }
 

@@ -2,12 +2,12 @@
 
 #include "fbxsdk/Limits.h"
 #include "fbxsdk/container/FileKind.h"
+#include "fbxsdk/container/Lent.h"
 #include "math/NumberText.h"
 
 #include <libdeflate.h>
 
 #include <cstring>
-#include <memory>
 #include <type_traits>
 
 namespace
@@ -32,6 +32,11 @@ constexpr char c_Letter = std::is_same_v<T, double> ? 'D'
 /// Below this, what deflating adds is more than it saves.
 constexpr std::size_t c_LeastDeflated = 128;
 
+libdeflate_compressor* MakeCompressor()
+{
+	return libdeflate_alloc_compressor(6);
+}
+
 template <typename T>
 void AppendArray(std::string& io_rBytes, std::span<const T> i_Numbers)
 {
@@ -40,11 +45,10 @@ void AppendArray(std::string& io_rBytes, std::span<const T> i_Numbers)
 	std::string deflated;
 	if (bDeflate)
 	{
-		using VCompressor = std::unique_ptr<libdeflate_compressor, decltype(&libdeflate_free_compressor)>;
-		thread_local const VCompressor pCompressor(libdeflate_alloc_compressor(6), &libdeflate_free_compressor);
-		deflated.resize(libdeflate_zlib_compress_bound(pCompressor.get(), size));
+		const VLent<MakeCompressor, libdeflate_free_compressor> compressor;
+		deflated.resize(libdeflate_zlib_compress_bound(compressor.Get(), size));
 		deflated.resize(
-		    libdeflate_zlib_compress(pCompressor.get(), i_Numbers.data(), size, deflated.data(), deflated.size()));
+		    libdeflate_zlib_compress(compressor.Get(), i_Numbers.data(), size, deflated.data(), deflated.size()));
 	}
 	const std::uint32_t header[3]{
 	    std::uint32_t(i_Numbers.size()), bDeflate ? 1u : 0u, std::uint32_t(bDeflate ? deflated.size() : size)};

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <numbers>
 
 namespace OrlexGraphics
 {
@@ -20,7 +21,7 @@ constexpr float c_LeastSlope = 0.000001f;
 // How far away a plane is met, in millimetres.
 constexpr float c_FarthestPlane = 90000.0f;
 
-constexpr double c_SnapAngle = M_PI / 4.0;
+constexpr double c_SnapAngle = std::numbers::pi / 4.0;
 constexpr double c_FineFactor = 0.2;
 // Nearer to the centre than this a pixel tells no direction.
 constexpr double c_LeastArm = 1.0;
@@ -146,7 +147,7 @@ std::optional<QMatrix4x4> VManipulatorDrag::Turn(
 		angle *= c_FineFactor;
 
 	QMatrix4x4 turned;
-	turned.rotate(static_cast<float>(m_Sign * angle * 180.0 / M_PI), m_Axis);
+	turned.rotate(static_cast<float>(m_Sign * angle * 180.0 / std::numbers::pi), m_Axis);
 	turned *= m_Start;
 	turned.setColumn(3, QVector4D(m_Centre, 1.0f));
 	return turned;

@@ -8,6 +8,7 @@
 #include <qopengl.h>
 
 #include <cmath>
+#include <numbers>
 
 namespace OrlexGraphics
 {
@@ -65,7 +66,7 @@ VShape MakeArrow()
 	{
 		for (int i = 0; i < c_ForceSides; ++i)
 		{
-			const auto angle = static_cast<float>(2.0 * M_PI * i / c_ForceSides);
+			const auto angle = static_cast<float>(2.0 * std::numbers::pi * i / c_ForceSides);
 			const QVector3D normal(std::cos(angle), std::sin(angle), 0.0f);
 			vertices.push_back({normal * rRing.m_Radius + QVector3D(0.0f, 0.0f, rRing.m_Z), normal, {}});
 		}
