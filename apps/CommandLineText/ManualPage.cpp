@@ -57,7 +57,7 @@ void AppendExamples(std::string& io_rPage, const CLI::App& i_rApp)
 
 std::string ManualPage(const CLI::App& i_rProgram, const std::string& i_rPurpose, const std::string& i_rVersion)
 {
-	const std::string name = i_rProgram.get_name();
+	const std::string& name = i_rProgram.get_name();
 	const std::vector<const CLI::App*> commands = ShownCommands(i_rProgram);
 	std::string title = name;
 	std::ranges::transform(title, title.begin(), [](unsigned char i_Letter) { return std::toupper(i_Letter); });

@@ -79,7 +79,7 @@ void RequireCommand(const CLI::App& i_rProgram, const std::vector<std::string>& 
 /// What is wrong with the line, in this program's words.
 std::string Describe(const CLI::ParseError& i_rError, const CLI::App& i_rApp)
 {
-	const std::string text = i_rError.what();
+	std::string text = i_rError.what();
 	const std::string name = text.substr(0, text.find_first_of(": "));
 	const CLI::Option* const pOption = i_rApp.get_option_no_throw(name);
 	if (dynamic_cast<const CLI::RequiredError*>(&i_rError))

@@ -284,7 +284,7 @@ TEST_P(RenderContext, SetVertexFormatEnablesWhatTheProgramHas)
 	EXPECT_EQ(m_Render.m_EnabledAttributes.to_ulong(), 0x3bul);
 	// There are eight places: no more can be enabled, whatever a format asks for.
 	VVertexFormat wild = VVertexFormat::Format3D();
-	for (const std::uint8_t attribute : {6, 8, 255})
+	for (const std::uint8_t attribute : std::initializer_list<std::uint8_t>{6, 8, 255})
 		wild.m_Entries.push_back({attribute, 3, 0, GL_FLOAT, 0});
 	m_Render.SetVertexFormat(wild);
 	EXPECT_EQ(m_Render.m_EnabledAttributes.to_ulong(), 1ul);

@@ -64,7 +64,7 @@ TEST(BadInput, DamagedBytes)
 	for (int i = 0; i < 3000; ++i)
 	{
 		std::string damaged = text;
-		for (unsigned hits = 1 + random() % 3; hits > 0; --hits)
+		for (auto hits = 1 + random() % 3; hits > 0; --hits)
 		{
 			const std::size_t place = random() % damaged.size();
 			switch (random() % 3)

@@ -4,6 +4,7 @@
 #include "DebugServices/GlobalLog.h"
 
 #include <string>
+#include <utility>
 #include <vector>
 
 /// Gathers, while it lives, everything that is logged, as "category level text", and failed assertions, as "ASSERT

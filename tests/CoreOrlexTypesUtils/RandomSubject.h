@@ -109,7 +109,7 @@ private:
 	{
 		std::vector<double> matrix(i_Size * i_Size, 0.25);
 		for (std::size_t i = 0; i < i_Size; ++i)
-			matrix[i * (i_Size + 1)] = i_Size + Below(8);
+			matrix[i * (i_Size + 1)] = double(i_Size + Below(8));
 		return matrix;
 	}
 

@@ -176,12 +176,12 @@ TEST_P(StagePictures, OfTextWhereItStands)
 	const QImage image = m_pTarget->toImage();
 	const auto extent = [&](int (*i_pChannel)(QRgb))
 	{
-		QRect extent;
+		QRect bounds;
 		for (int y = 0; y < image.height(); ++y)
 			for (int x = 0; x < image.width(); ++x)
 				if (i_pChannel(image.pixel(x, y)) > 0x80)
-					extent |= QRect(x, y, 1, 1);
-		return extent;
+					bounds |= QRect(x, y, 1, 1);
+		return bounds;
 	};
 	// From the point to the right, above it.
 	EXPECT_NEAR(extent(qRed).left(), 160, 3);

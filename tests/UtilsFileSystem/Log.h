@@ -3,6 +3,7 @@
 #include "DebugServices/GlobalLog.h"
 
 #include <string>
+#include <utility>
 #include <vector>
 
 /// Gathers what is logged in one category, as "level text".

@@ -151,7 +151,7 @@ TEST(Document, PrintsAsRapidXmlDoes)
 	const auto text = [&]
 	{
 		std::string result;
-		for (unsigned length = generator() % 6; length > 0; --length)
+		for (auto length = generator() % 6; length > 0; --length)
 			result += alphabet.substr(generator() % 8, 1);
 		return generator() % 4 ? result : result + "\xC3\xA4";
 	};
@@ -161,7 +161,7 @@ TEST(Document, PrintsAsRapidXmlDoes)
 		document.AppendDeclaration();
 		document.AppendProcessingInstruction("target", "a=\"<&>\"");
 		std::vector<VXmlNode*> elements = {document.AppendElement(document.GetRoot(), "root")};
-		for (unsigned count = generator() % 20; count > 0; --count)
+		for (auto count = generator() % 20; count > 0; --count)
 		{
 			VXmlNode* const pElement = document.AppendElement(elements[generator() % elements.size()], "e");
 			for (unsigned attributes = generator() % 4; attributes > 0; --attributes)

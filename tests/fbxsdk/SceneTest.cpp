@@ -103,7 +103,7 @@ TEST(AffineMatrix, IsStoredForRowVectorsAndMultipliesForColumnVectors)
 		return matrix;
 	};
 	const auto turn = [](int i_Axis, double i_Degrees)
-	{ return Eigen::AngleAxisd(i_Degrees * EIGEN_PI / 180.0, Eigen::Vector3d::Unit(i_Axis)); };
+	{ return Eigen::AngleAxisd(i_Degrees * double(EIGEN_PI) / 180.0, Eigen::Vector3d::Unit(i_Axis)); };
 	const Eigen::Affine3d expected =
 	    Eigen::Translation3d(1, 2, 3) * turn(2, 30) * turn(1, 20) * turn(0, 10) * Eigen::Scaling(1.0, 2.0, 3.0);
 	EXPECT_TRUE(toEigen(a).isApprox(expected.matrix(), 1e-14));

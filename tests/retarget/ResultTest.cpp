@@ -128,9 +128,9 @@ TEST(Take, IsHandedOn)
 	const std::string binary = Data("fbx/own_game_zup_m_b7400.fbx");
 	const auto run = [&](const std::vector<std::string>& i_rArguments, int i_Status, const std::string& i_rError)
 	{
-		const VRun run = folder.Run(i_rArguments);
-		EXPECT_EQ(run.m_Status, i_Status) << run.m_Err;
-		EXPECT_NE(run.m_Err.find(i_rError), std::string::npos) << run.m_Err;
+		const VRun result = folder.Run(i_rArguments);
+		EXPECT_EQ(result.m_Status, i_Status) << result.m_Err;
+		EXPECT_NE(result.m_Err.find(i_rError), std::string::npos) << result.m_Err;
 	};
 	run({"take", bvh, "-o", "again.bvh"}, 0, "");
 	EXPECT_EQ(RunJson({"take", "again.bvh", "--json"}, folder).at("frames"), 61u);

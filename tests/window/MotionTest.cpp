@@ -80,7 +80,8 @@ protected:
 		for (std::size_t frame = 0; frame < c_Frames; ++frame)
 			for (std::size_t i = 0; i < performer.m_BindPose.size(); ++i)
 				states.m_States.push_back(performer.m_BindPose[i]
-				    + (i < 6 ? 0.0 : 0.3 * std::sin(2.0 * M_PI * double(frame) / double(c_Frames - 1) * (1 + i % 3))));
+				    + (i < 6 ? 0.0
+				             : 0.3 * std::sin(2.0 * M_PI * double(frame) / double(c_Frames - 1) * double(1 + i % 3))));
 		QFile file(File("sway.bvh"));
 		ASSERT_TRUE(file.open(QIODevice::WriteOnly));
 		file.write(

@@ -24,14 +24,14 @@ boost::filesystem::path FindRenderer()
 	boost::dll::fs::error_code error;
 	const boost::filesystem::path here = boost::dll::program_location(error).parent_path();
 	for (const char* const pPlace : {RETARGET_RENDER_IN_BUILD, RETARGET_RENDER_INSTALLED})
-		if (const boost::filesystem::path program = (here / pPlace).lexically_normal(); is_regular_file(program, error))
+		if (boost::filesystem::path program = (here / pPlace).lexically_normal(); is_regular_file(program, error))
 			return program;
 	return {};
 }
 
 boost::filesystem::path Renderer()
 {
-	const boost::filesystem::path program = FindRenderer();
+	boost::filesystem::path program = FindRenderer();
 	if (program.empty())
 		throw VCommandError(EBadOutput,
 		    "The program that draws, retarget-render, is not in its place: install it, or build it, which takes Qt");

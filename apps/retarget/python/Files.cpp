@@ -38,8 +38,12 @@ void Write(const py::tuple& i_rParts, const std::string& i_rPath, const std::opt
 			throw py::value_error("the versions are " + CoreOrlexQRTIO::AllVersionTexts());
 		version = *value;
 	}
-	const auto& [rSubject, rData] = file.m_Record;
-	Call([&] { WriteSubjectFile(FilePath(i_rPath), rSubject, rData, file.m_Extras, version); });
+	Call(
+	    [&]
+	    {
+		    const auto& [rSubject, rData] = file.m_Record;
+		    WriteSubjectFile(FilePath(i_rPath), rSubject, rData, file.m_Extras, version);
+	    });
 }
 
 /// (element, index, name, message, remedy, tolerated)

@@ -47,7 +47,7 @@ enum EColumn
 	EPosition,
 	ERotation,
 	EReasons,
-	EColumnCount
+	EProposeColumnCount
 };
 
 /// Bits of a kind in its list.
@@ -122,7 +122,7 @@ VProposeDialog::VProposeDialog(VRetargetPanel& i_rPanel, TesselPluginInterface::
     const QString& i_rPresetFolder, QWidget* i_pParent)
     : QDialog(i_pParent), m_rPanel(i_rPanel), m_rSelection(io_rSelection), m_Before(io_rSelection.Items()),
       m_Sources(i_rPanel.SourceSegments()), m_Targets(i_rPanel.TargetSegments()), m_PresetFolder(i_rPresetFolder),
-      m_pTable(Named(new QTableWidget(0, EColumnCount), "Pairs", tr("Proposed pairs"))),
+      m_pTable(Named(new QTableWidget(0, EProposeColumnCount), "Pairs", tr("Proposed pairs"))),
       m_pOrigin(Named(new QComboBox, "PairsOrigin", tr("Where the pairs come from"))),
       m_pLeastScore(Named(new QDoubleSpinBox, "LeastScore", tr("Least score"))),
       m_pFilter(Named(new QLineEdit, "PairsFilter", tr("Rows whose names have this"))),
@@ -299,7 +299,7 @@ void VProposeDialog::AddRow(int i_Source, int i_Target, const QString& i_rReason
 {
 	const int row = m_pTable->rowCount();
 	m_pTable->insertRow(row);
-	for (int column = 0; column < EColumnCount; ++column)
+	for (int column = 0; column < EProposeColumnCount; ++column)
 	{
 		auto* const pItem = new QTableWidgetItem;
 		pItem->setFlags(Qt::ItemIsEnabled | Qt::ItemIsSelectable);

@@ -87,7 +87,7 @@ VMatrix3 MotionIO::ToZUp(TakeIO::EUp i_Up)
 	for (int from = 0; from < 3; ++from)
 	{
 		const TakeIO::VAxis to = TakeIO::AxisFromFile(i_Up, from);
-		matrix[std::size_t(3 * to.m_Axis + from)] = to.m_Sign;
+		matrix[3 * std::size_t(to.m_Axis) + std::size_t(from)] = to.m_Sign;
 	}
 	return matrix;
 }

@@ -213,7 +213,7 @@ private:
 		for (int row = 0; row < 3; ++row)
 		{
 			for (int column = 0; column < 3; ++column)
-				linear[std::size_t(3 * row + column)] = i_rPlaced.m_Transform(row, column);
+				linear[3 * std::size_t(row) + std::size_t(column)] = i_rPlaced.m_Transform(row, column);
 			place[std::size_t(row)] = 0.001 * i_rPlaced.m_Transform(row, 3);
 		}
 		const VMatrix3 turn = Product(Transposed(frame.R), m_Axes);

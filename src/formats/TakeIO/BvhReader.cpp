@@ -386,7 +386,7 @@ private:
 		const std::size_t channels = m_rTake.m_Channels;
 		std::vector<double>& rValues = m_rTake.m_Values;
 		// Each value takes two bytes at least.
-		const double backed = double(m_Text.BytesLeft() / 2 + 1);
+		const double backed = double(m_Text.BytesLeft()) / 2.0 + 1.0;
 		rValues.reserve(
 		    std::size_t(std::clamp(m_Claimed * double(channels), 0.0, std::min(backed, double(Limits::c_Values)))));
 		std::size_t shortLine = 0;

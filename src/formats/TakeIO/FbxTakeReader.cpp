@@ -380,8 +380,9 @@ private:
 		bool bFinite = ComputePoses({});
 		SetWorldRest(m_rTake, m_Poses);
 		m_rTake.m_Values.reserve(std::size_t(m_Frames) * m_rTake.m_Channels);
-		for (double frame = 0.0; frame < m_Frames && bFinite; ++frame)
+		for (std::size_t index = 0; double(index) < m_Frames && bFinite; ++index)
 		{
+			const auto frame = double(index);
 			bFinite = ComputePoses(m_Start + frame * c_FbxSecond / m_rTake.m_Rate);
 			AddFrame(m_rTake, m_Poses);
 			if (m_rTake.m_Frames % c_FramesBetweenProgress == 0 && m_rSettings.m_Progress
@@ -438,8 +439,8 @@ private:
 			{
 				const VAxis to = AxisFromFile(up, row);
 				const VAxis from = AxisFromFile(up, column);
-				o_rPose.R[std::size_t(3 * to.m_Axis + from.m_Axis)] =
-				    to.m_Sign * from.m_Sign * i_rGlobal.m_Rotation[std::size_t(3 * row + column)];
+				o_rPose.R[3 * std::size_t(to.m_Axis) + std::size_t(from.m_Axis)] =
+				    to.m_Sign * from.m_Sign * i_rGlobal.m_Rotation[3 * std::size_t(row) + std::size_t(column)];
 			}
 		const auto isSound = [](double i_Number) { return std::abs(i_Number) <= 1e15; };
 		return std::ranges::all_of(o_rPose.t, isSound) && std::ranges::all_of(o_rPose.R, isSound);

@@ -94,7 +94,7 @@ bool VParameterSet::IsValid(std::string& o_rMessage) const
 	std::string message;
 	for (const auto& [name, pParameter] : m_Parameters)
 		if (!pParameter->IsValid(message))
-			o_rMessage += "Parameter " + name + ": " + message + "\n";
+			o_rMessage.append("Parameter ").append(name).append(": ").append(message).append("\n");
 	return o_rMessage.empty();
 }
 

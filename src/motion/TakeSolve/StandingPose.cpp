@@ -90,6 +90,7 @@ template <typename TValue>
 double MedianOver(const std::vector<std::size_t>& i_rFrames, TValue i_Value)
 {
 	std::vector<double> values;
+	values.reserve(i_rFrames.size());
 	for (const std::size_t frame : i_rFrames)
 		values.push_back(i_Value(frame));
 	return Median(std::move(values));

@@ -49,7 +49,7 @@ bool VTesselPluginRetargetSetup::CreateContent(
 	    i_rContext.GetDispatcher(), i_rGui.GetSkinCache(), pRetargetSetup, pSelection, pScene);
 	i_rGui.GetPanelManager()->AddPanel("Retarget Setup", 5500, pWidget.get());
 	// The host owns it from here on.
-	pWidget.release();
+	static_cast<void>(pWidget.release());
 	return true;
 }
 

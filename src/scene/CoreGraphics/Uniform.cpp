@@ -13,7 +13,7 @@ int VUniform::LocationIn(const VShaderProgram& i_rProgram)
 			return rPlace.m_Location;
 	}
 	VPlace& rPlace = m_Places[m_Next];
-	m_Next = (m_Next + 1) % m_Places.size();
+	m_Next = std::uint32_t((m_Next + 1) % m_Places.size());
 	rPlace = {i_rProgram.LinkNumber(), i_rProgram.GetUniformLocation(m_pName)};
 	return rPlace.m_Location;
 }

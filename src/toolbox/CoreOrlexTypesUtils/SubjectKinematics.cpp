@@ -90,7 +90,7 @@ VSubjectKinematics::VSubjectKinematics(const VSubject& i_rSubject)
 	m_pKinematics = std::make_unique<ComputeSubject::VComputeSubjectFK>(subject);
 }
 
-VSubjectKinematics::VSubjectKinematics(VSubjectKinematics&&) = default;
+VSubjectKinematics::VSubjectKinematics(VSubjectKinematics&&) noexcept = default;
 
 VSubjectKinematics::~VSubjectKinematics() = default;
 

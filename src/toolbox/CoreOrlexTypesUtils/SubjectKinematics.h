@@ -30,7 +30,7 @@ class VSubjectKinematics
 {
 public:
 	explicit VSubjectKinematics(const CoreOrlexTypes::VSubject& i_rSubject);
-	VSubjectKinematics(VSubjectKinematics&&);
+	VSubjectKinematics(VSubjectKinematics&&) noexcept;
 	~VSubjectKinematics();
 
 	/// False if the segments make no tree, or more than one, or have a joint that does not fit its type. Only

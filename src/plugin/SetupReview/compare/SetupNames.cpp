@@ -86,8 +86,9 @@ VSetupNames::VSetupNames(const VSetup& i_rSetup) : m_rSetup(i_rSetup)
 			type = type.substr(5, type.find("To") - 5);
 		const std::string markers = ListText(m_Markers, rTarget.m_MarkerIndices);
 		const std::string rotations = ListText(m_Rotations, rTarget.m_RotationObservationIndices);
-		m_Targets.push_back(type + " " + markers + (markers.empty() || rotations.empty() ? "" : ", ") + rotations
-		    + " > " + ListText(m_Segments, rTarget.m_SegmentIndices));
+		type.append(" ").append(markers).append(markers.empty() || rotations.empty() ? "" : ", ").append(rotations);
+		type.append(" > ").append(ListText(m_Segments, rTarget.m_SegmentIndices));
+		m_Targets.push_back(std::move(type));
 	}
 	m_Targets = Distinct(std::move(m_Targets));
 }
