@@ -14,17 +14,15 @@ set(CMAKE_INSTALL_DEFAULT_COMPONENT_NAME programs)
 file(RELATIVE_PATH RETARGET_FROM_PROGRAMS /${CMAKE_INSTALL_BINDIR} /${RETARGET_LIBRARY_DESTINATION})
 set(CMAKE_INSTALL_RPATH $ORIGIN $ORIGIN/${RETARGET_FROM_PROGRAMS})
 # One form of code for the libraries, the module that is made of them, and the programs.
-add_compile_options(-fPIC -Wall -Wextra -Werror)
+add_compile_options(-fPIC -Wall -Wextra -Wconversion -Wshadow -Werror)
+if(CMAKE_CXX_COMPILER_ID MATCHES "Clang")
+	# Whether a number has a sign is left out: an index that is an int and small by its loop is no fault. An assertion that
+	# always fails says why, in a text that clang would take for a slip.
+	add_compile_options(-Wno-sign-conversion -Wno-string-conversion)
+endif()
 if(WIN32)
 	# Of the system's headers no macros by the names of functions, and the core of them only.
 	add_compile_definitions(NOMINMAX WIN32_LEAN_AND_MEAN)
-endif()
-# For the wings that both compilers find clean: numbers that lose something on their way, and names that hide others.
-# Whether a number has a sign is left out: an index that is an int and small by its loop is no fault. An assertion that
-# always fails says why, in a text that clang would take for a slip.
-set(RETARGET_WARNINGS "-Wconversion -Wshadow")
-if(CMAKE_CXX_COMPILER_ID MATCHES "Clang")
-	string(APPEND RETARGET_WARNINGS " -Wno-sign-conversion -Wno-string-conversion")
 endif()
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_LESS 13)
 	# False alarms about string concatenation at -O3.
