@@ -53,6 +53,13 @@ void ReadObservation(INode& io_rNode, const VTargetKind& i_rKind, VReading& io_r
 	if (!ReadAttribute(io_rNode, *i_rKind.m_pObservation, name))
 		return;
 	std::vector<std::uint32_t>& rIndices = io_rInHand.m_Target.m_RotationObservationIndices;
+	if (!rIndices.empty())
+	{
+		io_rNode.AddError(
+		    (boost::format("Target %1% has multiple Rotation Observations") % io_rInHand.m_ApplicationData.m_Name)
+		        .str());
+		return;
+	}
 	auto& rRotations = io_rReading.m_rSubject.m_Rotations;
 	const auto index = static_cast<std::uint32_t>(rRotations.size());
 	const auto known = io_rReading.m_RotationsByName.find(name);
