@@ -1,5 +1,6 @@
 # find_package(RetargetSetup): targets RetargetSetup::<Library>, included as "Library/File.h".
 include(CMakeFindDependencyMacro)
+find_dependency(Threads)
 find_dependency(Boost COMPONENTS filesystem regex system)
 # Whether the libraries that draw and show were built.
 if(@RETARGET_QT@)
