@@ -1,5 +1,6 @@
 // The panel's parameters: what they are called, where their values come from.
 
+#include "../LogRecorder.h"
 #include "../UtilsFileSystem/Folder.h"
 #include "TestHost.h"
 
@@ -173,6 +174,11 @@ TEST_F(PanelParameters, BeginWithTheClusterTemplateWhereNothingValidIsStored)
 	EXPECT_EQ(begins(nullptr), "ClusterTemplate.qrs");
 	EXPECT_EQ(begins(other.c_str()), "Other.qrs");
 	EXPECT_EQ(begins((m_Root / "gone.qrs").c_str()), "ClusterTemplate.qrs");
+	{
+		VLogRecorder errors(NVX::ELogError);
+		EXPECT_EQ(begins("performer"), "ClusterTemplate.qrs") << "a target subject told it in an earlier run";
+		EXPECT_EQ(errors.Take(), "");
+	}
 	EXPECT_EQ(begins(elsewhere.c_str()), "Far.qrs");
 	EXPECT_EQ(Names(*Make().m_pSourceSkeleton), (std::vector<std::string>{"ClusterTemplate", "Far", "Other"}))
 	    << "the folder of a file from elsewhere is watched, too";

@@ -87,6 +87,9 @@ VPanelParameters::VPanelParameters(const std::shared_ptr<TesselPluginInterface::
 	m_pTargetFBX->AddFolder("User", i_rFolders.Folder(c_FolderKeys[TesselPluginInterface::EPathSkins]), c_UserPriority);
 	AddInstalled(*m_pTargetFBX, i_rInstalled.m_Skins);
 	AddInstalled(*m_pSourceSkin, i_rInstalled.m_Skins);
+	// A bare name was told by the target subject of an earlier run: nobody chose it, and nothing of it is lost.
+	if (!UtilsFileSystem::PathFromUtf8(m_pSourceSkeleton->GetValueText()).is_absolute())
+		m_pSourceSkeleton->ClearValue();
 	Start(*m_pSourceSkeleton);
 	Start(*m_pSourceSkin);
 	Start(*m_pTargetFBX);
