@@ -27,7 +27,7 @@ TEST(Diff, TellsEditsInWords)
 	         {{"--weight", "1=0.25"}, "target \"Rotation LeftArm > LeftArm\": weight 1 -> 0.25\n"},
 	         {{"--scale", "1.5"}, "subject: scale 1 -> 1.5\n"},
 	         {{"--pose", "LeftArm=0,0,0", "--pose", "LeftArm=0.5,0,0"}, "segment \"LeftArm\": bind pose"},
-	         {{"--remove-target", "0"}, "target \"Point Hips > Hips\": removed\n"},
+	         {{"--remove-target", "0"}, "target \"Position Hips > Hips\": removed\n"},
 	         {{"--prune-joints"}, "segment \"Head\": joint pruned, which was of type Ball\n"},
 	     })
 	{

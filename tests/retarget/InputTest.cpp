@@ -151,7 +151,7 @@ TEST_F(Input, ErrorsCount)
 	    {
 	        {"evaluated", {"dump", "--evaluated", "state.qrr"}, 3, "\"Subject\"", end},
 	        {"segments", {"segments", "state.qrr"}, 3, "Hips", end},
-	        {"targets", {"targets", "state.qrr"}, 3, "Point", end},
+	        {"targets", {"targets", "state.qrr"}, 3, "Position", end},
 	        {"fk", {"fk", "static.qrx"}, 3, "Hips", end},
 	        {"edit", {"edit", "state.qrr", "--weight", "1=2", "-o", "x.qrr"}, 3, "", end},
 	        {"legacy", {"edit", "static.qrx", "-o", "x.qrr"}, 3, "", end},

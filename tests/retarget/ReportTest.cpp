@@ -35,6 +35,7 @@ TEST(Report, TellsTheSetUp)
 	for (const char* const pRaw : {"<script", "<i>", "\xE2\x80\xAE", "<img"})
 		EXPECT_EQ(page.find(pRaw), std::string::npos) << pRaw;
 	for (const char* const pShown : {"&lt;script&gt;[U+202E]", "Retarget subject &lt;i&gt;&amp;#10;.qrr",
+	         "<bdi>Position</bdi></td><td><bdi>Hips</bdi>",
 	         "<bdi>Hips</bdi></td><td class=\"n\"><bdi>1</bdi></td><td class=\"n\"><bdi>3.0, 4.0, 0.0 mm</bdi>",
 	         "<bdi>upper arm</bdi>", "<bdi>LeftHandThumb2</bdi></td><td><bdi>go</bdi>",
 	         "No range of motion: no target follows a segment", "Pictures were not asked for"})

@@ -58,7 +58,7 @@ VTable LinesToTable(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals,
 	{
 		const VTargetLine& rLine = i_rLines[i];
 		std::vector<std::string> texts{
-		    std::to_string(i), ShortType(rLine.m_Type), rLine.m_Source, rLine.m_Target, Shortest(rLine.m_Weight)};
+		    std::to_string(i), rLine.m_Kind, rLine.m_Source, rLine.m_Target, Shortest(rLine.m_Weight)};
 		if (i_bResiduals)
 			texts.push_back(ResidualText(rLine.m_Residual.m_Offset));
 		if (i_bStates)

@@ -152,7 +152,7 @@ void AddTargets(VSession& io_rSession, bool i_bSource, VPage& io_rPage)
 	VRows rows;
 	for (std::size_t i = 0; i < lines.size(); ++i)
 	{
-		rows.push_back({std::to_string(i), ShortType(lines[i].m_Type), lines[i].m_Source, lines[i].m_Target,
+		rows.push_back({std::to_string(i), lines[i].m_Kind, lines[i].m_Source, lines[i].m_Target,
 		    Shortest(lines[i].m_Weight), OffsetText(pSubject->m_Targets[i])});
 		if (i_bSource)
 			rows.back().push_back(ResidualText(lines[i].m_Residual.m_Offset));

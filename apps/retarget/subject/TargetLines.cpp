@@ -50,6 +50,7 @@ std::vector<VTargetLine> TargetLines(VSession& io_rSession, bool i_bResiduals)
 		if (i < target.m_pApplicationData->m_Targets.size())
 			rLine.m_Name = target.m_pApplicationData->m_Targets[i].m_Name;
 		rLine.m_Type = CoreOrlexTypes::EnumeratorName(rTarget.m_Type);
+		rLine.m_Kind = RetargetSetup::TargetKindName(rTarget.m_Type);
 		for (const std::string& rName : FollowedNames(rSubject, rTarget))
 			rLine.m_Source += (rLine.m_Source.empty() ? "" : ", ") + rName;
 		if (const std::string* pName = RetargetSetup::TargetSegmentName(rSubject, rTarget))
@@ -59,13 +60,6 @@ std::vector<VTargetLine> TargetLines(VSession& io_rSession, bool i_bResiduals)
 		rLine.m_Residual = residuals[i];
 	}
 	return lines;
-}
-
-std::string ShortType(std::string i_Type)
-{
-	if (i_Type.starts_with("Local"))
-		i_Type.erase(0, 5);
-	return i_Type.substr(0, i_Type.find("To"));
 }
 
 VJson LinesToJson(const std::vector<VTargetLine>& i_rLines, bool i_bResiduals)

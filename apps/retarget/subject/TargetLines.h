@@ -14,6 +14,8 @@ struct VTargetLine
 {
 	std::string m_Name;
 	std::string m_Type;
+	/// As RetargetSetup::TargetKindName.
+	std::string m_Kind;
 	std::string m_Source;
 	std::string m_Target;
 	double m_Weight = 0.0;
@@ -32,8 +34,5 @@ double AsDegrees(double i_Radians);
 
 /// "1.250 mm", "0.300 deg", "-" for none.
 std::string ResidualText(const VResidual& i_rResidual);
-
-/// "Point" for "LocalPointToWorldPoint": what the type has in the target segment.
-std::string ShortType(std::string i_Type);
 
 } // namespace CommandLine

@@ -1,6 +1,7 @@
 #include "RetargetSetupCore/RetargetTargets.h"
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
+#include "CoreOrlexTypes/Fields.h"
 #include "CoreOrlexTypes/NameHash.h"
 #include "CoreOrlexTypesUtils/observations/UnusedObservations.h"
 #include "DebugServices/GlobalLog.h"
@@ -50,6 +51,15 @@ Rotation::VPose<double> SourceInTarget(const VComputeSubjectFK& i_rSourceFK, con
 }
 
 } // namespace
+
+std::string TargetKindName(VTarget::ETargetType i_Type)
+{
+	std::string kind(CoreOrlexTypes::EnumeratorName(i_Type));
+	if (kind.starts_with("Local"))
+		kind.erase(0, 5);
+	kind.erase(std::min(kind.find("To"), kind.size()));
+	return kind == "Point" ? "Position" : kind;
+}
 
 const std::string* SourceName(const VSubjectParametrised& i_rSubject, const VTarget& i_rTarget)
 {

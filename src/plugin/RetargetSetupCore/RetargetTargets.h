@@ -29,6 +29,9 @@ struct VNewTarget
 	double m_Weight = 1.0;
 };
 
+/// The word for a kind of target: "Position", "Rotation", or what the type has in the target segment, as "Plane".
+std::string TargetKindName(CoreOrlexTypes::VSubjectParametrised::VTarget::ETargetType i_Type);
+
 /// The name of the source segment: of the first marker for a position target, of the first rotation observation for any
 /// other. Null if the target names none, or one that is not there.
 const std::string* SourceName(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,

@@ -72,7 +72,9 @@ QVariant VRetargetSetupTargetModel::data(const QModelIndex& i_rIndex, int i_Role
 	case SourceSegment:
 		return bPosition || bRotation ? TextOrNothing(RetargetSetup::SourceName(*m_pSubject, rTarget)) : QVariant();
 	case TargetSegment: return TextOrNothing(RetargetSetup::TargetSegmentName(*m_pSubject, rTarget));
-	case TargetType: return bPosition ? QVariant("Position") : bRotation ? QVariant("Rotation") : QVariant();
+	case TargetType:
+		return bPosition || bRotation ? QVariant(QString::fromStdString(RetargetSetup::TargetKindName(rTarget.m_Type)))
+		                              : QVariant();
 	case Weight: return rTarget.m_Weight;
 	case SelectionItem:
 		return QVariant::fromValue(

@@ -1,7 +1,7 @@
 #include "SetupReview/compare/SetupNames.h"
 
-#include "CoreOrlexTypes/Fields.h"
 #include "CoreOrlexTypes/NameHash.h"
+#include "RetargetSetupCore/RetargetTargets.h"
 
 #include <algorithm>
 #include <map>
@@ -81,14 +81,12 @@ VSetupNames::VSetupNames(const VSetup& i_rSetup) : m_rSetup(i_rSetup)
 	m_Rotations = NamesInOrder(rSubject.m_Rotations);
 	for (const VSubjectParametrised::VTarget& rTarget : rSubject.m_Targets)
 	{
-		std::string type(CoreOrlexTypes::EnumeratorName(rTarget.m_Type));
-		if (type.starts_with("Local"))
-			type = type.substr(5, type.find("To") - 5);
 		const std::string markers = ListText(m_Markers, rTarget.m_MarkerIndices);
 		const std::string rotations = ListText(m_Rotations, rTarget.m_RotationObservationIndices);
-		type.append(" ").append(markers).append(markers.empty() || rotations.empty() ? "" : ", ").append(rotations);
-		type.append(" > ").append(ListText(m_Segments, rTarget.m_SegmentIndices));
-		m_Targets.push_back(std::move(type));
+		std::string name = RetargetSetup::TargetKindName(rTarget.m_Type);
+		name.append(" ").append(markers).append(markers.empty() || rotations.empty() ? "" : ", ").append(rotations);
+		name.append(" > ").append(ListText(m_Segments, rTarget.m_SegmentIndices));
+		m_Targets.push_back(std::move(name));
 	}
 	m_Targets = Distinct(std::move(m_Targets));
 }
