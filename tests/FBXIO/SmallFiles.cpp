@@ -192,7 +192,7 @@ void Repack(VList& io_rRecords, std::mt19937& io_rRandom)
 		    const std::size_t counts[]{
 		        numbers.size(), numbers.size(), numbers.size(), bytes.size() / 8, 0x7fffffff, 0x80000000, 0xffffffff};
 		    VRaw raw = PackedArray(type, OneOf(counts, io_rRandom), io_rRandom() % 3 != 0, bytes);
-		    if (io_rRandom() % 4 == 0)
+		    if (io_rRandom() % 4 == 0 && raw.m_Bytes.size() > 13)
 			    raw.m_Bytes.at(13 + Below(io_rRandom, raw.m_Bytes.size() - 13)) ^= char(1 << io_rRandom() % 8);
 		    io_rValue = std::move(raw);
 	    });
