@@ -55,6 +55,6 @@ BENCHMARK_CAPTURE(SetPose, history, true)->Name("SetPoseUndoable")->Apply(Sizes)
 int main(int i_Count, char** i_ppArguments)
 {
 	return Ratios::Main(i_Count, i_ppArguments,
-	    {{"AddTarget", "Copies", 2.5}, {"SetPose", "Copies", 2.5}, {"AddTargetUndoable", "AddTarget", 1.3},
-	        {"SetPoseUndoable", "SetPose", 1.1}});
+	    {{"AddTarget", "Copies", 3.0, {"30"}}, {"AddTarget", "Copies", 2.5, {"70", "100", "300", "1000", "3000"}},
+	        {"SetPose", "Copies", 2.5}, {"AddTargetUndoable", "AddTarget", 1.5}, {"SetPoseUndoable", "SetPose", 1.1}});
 }
