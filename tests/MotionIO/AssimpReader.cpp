@@ -107,10 +107,3 @@ VNodePoses ReadByAssimp(
 	}
 	return std::move(walk.m_Poses);
 }
-
-double RateByAssimp(const std::string& i_rBytes, const char* i_pForm)
-{
-	Assimp::Importer importer;
-	const aiScene* const pScene = importer.ReadFileFromMemory(i_rBytes.data(), i_rBytes.size(), 0, i_pForm);
-	return pScene && pScene->mNumAnimations > 0 ? pScene->mAnimations[0]->mTicksPerSecond : 0.0;
-}

@@ -12,8 +12,5 @@ using VNodePoses = std::map<std::string, std::vector<Rotation::VPose<double>>>;
 VNodePoses ReadByAssimp(
     const std::string& i_rBytes, const char* i_pForm, const std::string& i_rAnimation, std::size_t i_Frames);
 
-/// Frames a second of the file; 0 without an animation.
-double RateByAssimp(const std::string& i_rBytes, const char* i_pForm);
-
 /// Where the first frame of the animation puts the points of all meshes that bones move.
 std::vector<Rotation::VVector3> SkinnedPoints(const std::string& i_rBytes, const char* i_pForm);

@@ -1,7 +1,6 @@
 #include "MotionIO/FbxMotion.h"
 
 #include "TakeIO/FbxCurve.h"
-#include "TakeIO/FbxJoints.h"
 #include "fbxsdk/container/RecordInsertion.h"
 #include "fbxsdk/container/RecordWriter.h"
 #include "fbxsdk/container/Values.h"
@@ -75,8 +74,7 @@ public:
 		if (!Sample(motion))
 			return EPrinted::Cancelled;
 		Name();
-		const std::string file = AtRate(i_File);
-		const bool bFits = InsertRecords(file, rKind.m_Version, m_rTree,
+		const bool bFits = InsertRecords(i_File, rKind.m_Version, m_rTree,
 		    {{"Objects", [this](VRecordWriter& io_rWriter) { WriteObjects(io_rWriter); }},
 		        {"Connections", [this](VRecordWriter& io_rWriter) { WriteConnections(io_rWriter); }},
 		        {"Takes", [this](VRecordWriter& io_rWriter) { WriteTake(io_rWriter); }}},
@@ -87,24 +85,6 @@ public:
 	}
 
 private:
-	/// The file with the motion's rate as its own: programs bring motions to that. Times stay what they are, those of
-	/// its other stacks too. Its records stay where they stand.
-	std::string AtRate(std::string_view i_File) const
-	{
-		std::string file(i_File);
-		const std::int32_t mode = TakeIO::TimeModeOf(m_rMotion.m_Rate);
-		const VElementIndex settings = m_rTree.Find(VElementTree::c_Root, "GlobalSettings");
-		for (const VElementIndex property : m_rTree.Children(m_rTree.Find(settings, "Properties70")))
-		{
-			const std::string_view name = ValueAt(m_rTree, property, 0).m_Text;
-			if (name == "TimeMode")
-				OverwriteLast(file, m_rTree, property, mode);
-			else if (name == "CustomFrameRate" && mode == TakeIO::c_OwnTimeMode)
-				OverwriteLast(file, m_rTree, property, m_rMotion.m_Rate);
-		}
-		return file;
-	}
-
 	bool Sample(VBoneMotion& io_rMotion)
 	{
 		std::vector<VTrack> tracks;

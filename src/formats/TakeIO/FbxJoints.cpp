@@ -5,8 +5,6 @@
 #include "fbxsdk/document/Properties.h"
 #include "fbxsdk/scene/ReadTransform.h"
 
-#include <cmath>
-
 namespace
 {
 
@@ -129,13 +127,4 @@ TakeIO::VFbxSettings TakeIO::ReadFbxSettings(const VDocument& i_rDocument)
 	if (known >= Limits::c_LeastRate && known <= Limits::c_GreatestRate)
 		settings.m_Rate = known;
 	return settings;
-}
-
-std::int32_t TakeIO::TimeModeOf(double i_Rate)
-{
-	// The default's rate is the reader's, and those with dropped frames count them otherwise.
-	for (const std::int32_t mode : {1, 2, 3, 4, 5, 6, 9, 10, 11, 12, 13})
-		if (std::abs(c_TimeModes[mode] - i_Rate) < 1e-6 * i_Rate)
-			return mode;
-	return c_OwnTimeMode;
 }

@@ -59,8 +59,4 @@ struct VFbxSettings
 /// What no take can have is left at these defaults, but for a unit that is none: that is 0.
 VFbxSettings ReadFbxSettings(const FbxFormat::VDocument& i_rDocument);
 
-/// The number of the time mode that has these frames a second; c_OwnTimeMode if none has that every reader knows.
-inline constexpr std::int32_t c_OwnTimeMode = 14;
-std::int32_t TimeModeOf(double i_Rate);
-
 } // namespace TakeIO

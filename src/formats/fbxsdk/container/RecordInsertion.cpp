@@ -3,7 +3,6 @@
 #include "fbxsdk/Limits.h"
 #include "fbxsdk/container/BinaryValues.h"
 #include "fbxsdk/container/FileKind.h"
-#include "fbxsdk/container/Values.h"
 
 #include <algorithm>
 #include <cstring>
@@ -138,28 +137,4 @@ bool FbxFormat::InsertRecords(std::string_view i_File, std::uint32_t i_Version, 
 		return false;
 	o_rBytes = std::move(bytes);
 	return true;
-}
-
-bool FbxFormat::OverwriteLast(
-    std::string& io_rBytes, const VElementTree& i_rTree, VElementIndex i_Element, double i_Number)
-{
-	VValueCursor cursor(i_rTree, i_Element);
-	VValue last;
-	for (VValue value = cursor.Next(); value.m_Kind != EValueKind::None; value = cursor.Next())
-		last = value;
-	const auto put = [&](char i_Type, auto i_Value)
-	{
-		const std::size_t size = 1 + sizeof(i_Value);
-		const VElement& rElement = i_rTree[i_Element];
-		if (rElement.m_ValuesSize < size)
-			return false;
-		char* const pPlace = io_rBytes.data() + rElement.m_Values + rElement.m_ValuesSize - size;
-		if (*pPlace != i_Type)
-			return false;
-		std::memcpy(pPlace + 1, &i_Value, sizeof(i_Value));
-		return true;
-	};
-	if (last.m_Kind == EValueKind::Integer)
-		return put('I', std::int32_t(i_Number)) || put('L', std::int64_t(i_Number));
-	return last.m_Kind == EValueKind::Real && put('D', i_Number);
 }

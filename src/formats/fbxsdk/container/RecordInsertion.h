@@ -23,10 +23,4 @@ struct VInsertion
 bool InsertRecords(std::string_view i_File, std::uint32_t i_Version, const VElementTree& i_rTree,
     const std::vector<VInsertion>& i_rInsertions, std::string& o_rBytes);
 
-/// Puts another number in the place of the last value of a record, which is one of the same size: an integer of 4 or 8
-/// bytes, or a real.
-/// @param io_rBytes of a binary file, of which the tree is
-/// @return false, with no change, if the record ends otherwise.
-bool OverwriteLast(std::string& io_rBytes, const VElementTree& i_rTree, VElementIndex i_Element, double i_Number);
-
 } // namespace FbxFormat
