@@ -128,8 +128,9 @@ void TellSkeletonBesideTakes()
 	{
 		const std::clock_t begin = std::clock();
 		FBXIO::FBXReader reader;
+		// Without times it is told that nothing was measured.
 		if (!reader.LoadFile((folder / "takes.fbx").string()) || !reader.HasSkeleton())
-			return;
+			break;
 		times.push_back(double(std::clock() - begin) * 1e3 / CLOCKS_PER_SEC);
 	}
 	const std::string size = std::to_string(file_size(folder / "takes.fbx") / 1000) + " kB";
