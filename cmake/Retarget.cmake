@@ -168,9 +168,10 @@ function(retarget_test name)
 		# The driver draws without threads of its own, which ThreadSanitizer does not know to wait for each other.
 		set(threads "LP_NUM_THREADS=0;TSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/threads.supp")
 	endif()
-	# XCB copies texts that do not end in a zero, with their length: the strict checks take that for an overflow.
+	# XCB copies texts that do not end in a zero, with their length: the strict checks take that for an overflow. Without
+	# a word about the session's bus Qt would try to start one, in a thread that may be in the midst of it at the end.
 	set_tests_properties(${name} PROPERTIES ENVIRONMENT
-		"QT_QPA_PLATFORM=xcb;LIBGL_ALWAYS_SOFTWARE=1;ASAN_OPTIONS=detect_leaks=1;${threads}")
+		"QT_QPA_PLATFORM=xcb;LIBGL_ALWAYS_SOFTWARE=1;DBUS_SESSION_BUS_ADDRESS=disabled:;ASAN_OPTIONS=detect_leaks=1;${threads}")
 endfunction()
 
 # retarget_long_test(NAME SECONDS): begins before shorter ones, so that it does not run alone at the end.
