@@ -96,7 +96,7 @@ std::atomic<int>& LogDescriptor()
 void Keep(const std::string& i_rLine)
 {
 	const int descriptor = LogDescriptor();
-	if (descriptor < 0 || write(descriptor, i_rLine.data(), i_rLine.size()) == ssize_t(i_rLine.size()))
+	if (descriptor < 0 || WriteAtOnce(descriptor, i_rLine))
 		return;
 	LogDescriptor() = -1;
 	std::fprintf(stderr, "warning %s: The log file is not complete: %s\n", c_pCategory, std::strerror(errno));

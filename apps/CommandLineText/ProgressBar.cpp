@@ -1,6 +1,7 @@
 #include "CommandLineText/ProgressBar.h"
 
 #include "CommandLineText/Messages.h"
+#include "CommandLineText/System.h"
 
 #include <algorithm>
 #include <atomic>
@@ -23,7 +24,7 @@ std::atomic<bool> s_bShown{false};
 void EndLine(std::string_view i_How)
 {
 	if (s_bShown.exchange(false))
-		static_cast<void>(!write(STDERR_FILENO, i_How.data(), i_How.size()));
+		WriteAtOnce(STDERR_FILENO, i_How);
 }
 
 } // namespace

@@ -5,6 +5,7 @@
 #include <cstddef>
 #include <cstdio>
 #include <string>
+#include <string_view>
 
 /// What a program of the command line asks of the system. One file for each system implements it.
 namespace CommandLine
@@ -19,6 +20,10 @@ void PrepareStreams();
 /// Opens a file, made if it is not there, whose writes each go to its end in one piece, whoever else writes to it.
 /// @return a descriptor; -1 with errno set.
 int OpenToAppend(const std::string& i_rFile);
+
+/// Writes a text in one piece, without what the standard streams keep back: also for handlers of signals.
+/// @return whether all of it was written; if not, errno tells why.
+bool WriteAtOnce(int i_Descriptor, std::string_view i_Text);
 
 /// A file that is written once, and goes when the process ends; there is one at a time.
 /// @return null with errno set.

@@ -21,6 +21,11 @@ int OpenToAppend(const std::string& i_rFile)
 	return ::open(i_rFile.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0666);
 }
 
+bool WriteAtOnce(int i_Descriptor, std::string_view i_Text)
+{
+	return ::write(i_Descriptor, i_Text.data(), i_Text.size()) == ssize_t(i_Text.size());
+}
+
 std::FILE* OpenScratchFile()
 {
 	return std::tmpfile();

@@ -49,6 +49,12 @@ int OpenToAppend(const std::string& i_rFile)
 	return -1;
 }
 
+bool WriteAtOnce(int i_Descriptor, std::string_view i_Text)
+{
+	const auto size = unsigned(i_Text.size());
+	return size == i_Text.size() && ::_write(i_Descriptor, i_Text.data(), size) == int(size);
+}
+
 std::FILE* OpenScratchFile()
 {
 	boost::system::error_code error;

@@ -2,6 +2,7 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/ProgressBar.h"
+#include "CommandLineText/System.h"
 
 #include "UtilsFileSystem/SaveFile.h"
 
@@ -10,7 +11,6 @@
 #include <cxxabi.h>
 #include <exception>
 #include <new>
-#include <string_view>
 #include <typeinfo>
 #include <unistd.h>
 
@@ -44,8 +44,7 @@ std::terminate_handler s_pTerminateBefore = nullptr;
 		std::abort();
 	}
 	UtilsFileSystem::RemoveUnfinishedSaves();
-	constexpr std::string_view c_Text = "error retarget: Out of memory\n";
-	static_cast<void>(!::write(STDERR_FILENO, c_Text.data(), c_Text.size()));
+	WriteAtOnce(STDERR_FILENO, "error retarget: Out of memory\n");
 	std::_Exit(EBadInput);
 }
 

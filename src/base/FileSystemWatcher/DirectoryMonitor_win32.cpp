@@ -10,6 +10,8 @@
 #include <iterator>
 #include <map>
 #include <mutex>
+#include <set>
+#include <string>
 
 namespace FileSystemWatcher
 {
@@ -49,7 +51,30 @@ struct VRead
 		    m_Directory, m_Buffer, sizeof(m_Buffer), FALSE, i_Changes, nullptr, &m_Overlapped, nullptr);
 	}
 
+	/// What is gone cannot be asked any more whether it was a directory.
+	void LearnDirectories()
+	{
+		m_Directories.clear();
+		boost::system::error_code error;
+		for (boost::filesystem::directory_iterator it(m_Path, error), end; !error && it != end; it.increment(error))
+			if (boost::system::error_code unknown; boost::filesystem::is_directory(it->status(unknown)))
+				m_Directories.insert(it->path().filename().native());
+	}
+
+	/// Whether an event is of a directory: one that came and was gone again before it was asked is taken for a file.
+	bool Learn(EFileChange i_Change, const std::wstring& i_rName)
+	{
+		if (i_Change == ERemoved || i_Change == ERenamedOld)
+			return m_Directories.erase(i_rName) > 0;
+		boost::system::error_code error;
+		if (boost::filesystem::is_directory(m_Path / i_rName, error))
+			return m_Directories.insert(i_rName), true;
+		// It may have gone again.
+		return m_Directories.contains(i_rName);
+	}
+
 	boost::filesystem::path m_Path;
+	std::set<std::wstring> m_Directories;
 	HANDLE m_Directory = INVALID_HANDLE_VALUE;
 	OVERLAPPED m_Overlapped = {};
 	alignas(DWORD) char m_Buffer[1024];
@@ -93,11 +118,16 @@ public:
 		pRead->m_Directory = ::CreateFileW(UtilsFileSystem::Platform::NativePath(i_rDirectory).c_str(),
 		    FILE_LIST_DIRECTORY, FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE, nullptr, OPEN_EXISTING,
 		    FILE_FLAG_BACKUP_SEMANTICS | FILE_FLAG_OVERLAPPED, nullptr);
+		if (pRead->m_Directory == INVALID_HANDLE_VALUE)
+			Throw();
+		// The system opens files so, too.
+		if (boost::system::error_code error; !boost::filesystem::is_directory(i_rDirectory, error))
+			throw boost::system::system_error(make_error_code(boost::system::errc::not_a_directory), c_pMonitorFailure);
 		const std::lock_guard lock(m_Mutex);
 		const int watch = ++m_LastWatch;
-		if (pRead->m_Directory == INVALID_HANDLE_VALUE
-		    || !::CreateIoCompletionPort(pRead->m_Directory, m_Port, ULONG_PTR(watch), 1) || !pRead->Arm())
+		if (!::CreateIoCompletionPort(pRead->m_Directory, m_Port, ULONG_PTR(watch), 1) || !pRead->Arm())
 			Throw();
+		pRead->LearnDirectories();
 		m_Reads.emplace(watch, std::move(pRead));
 		return watch;
 	}
@@ -147,7 +177,10 @@ private:
 		if (i_Error == ERROR_SUCCESS && i_Bytes > 0)
 			Translate(i_Watch, rRead, io_rEvents);
 		else if (i_Error == ERROR_SUCCESS || i_Error == ERROR_NOTIFY_ENUM_DIR)
+		{
+			rRead.LearnDirectories();
 			io_rEvents.push_back(Failure(i_Watch, "too many changes at once, some are lost", false));
+		}
 		else
 		{
 			io_rEvents.push_back(Failure(i_Watch, ErrorText(i_Error), true));
@@ -171,19 +204,21 @@ private:
 	}
 
 	/// The system's kinds have our numbers, and it tells a rename as old and new name in a row.
-	static void Translate(int i_Watch, const VRead& i_rRead, std::vector<VSystemEvent>& io_rEvents)
+	static void Translate(int i_Watch, VRead& io_rRead, std::vector<VSystemEvent>& io_rEvents)
 	{
-		const char* p = i_rRead.m_Buffer;
+		const char* p = io_rRead.m_Buffer;
 		for (;;)
 		{
 			const auto* const pInformation = reinterpret_cast<const FILE_NOTIFY_INFORMATION*>(p);
 			const std::wstring name(pInformation->FileName, pInformation->FileNameLength / sizeof(wchar_t));
-			boost::system::error_code error;
 			VSystemEvent event;
 			event.m_Watch = i_Watch;
 			event.m_Change = EFileChange(pInformation->Action);
 			event.m_Name = UtilsFileSystem::ToUtf8(name);
-			event.m_bDirectory = boost::filesystem::is_directory(i_rRead.m_Path / name, error);
+			event.m_bDirectory = io_rRead.Learn(event.m_Change, name);
+			// One that came and was renamed at once.
+			if (event.m_Change == ERenamedNew && !io_rEvents.empty() && io_rEvents.back().m_Change == ERenamedOld)
+				io_rEvents.back().m_bDirectory = event.m_bDirectory;
 			io_rEvents.push_back(std::move(event));
 			if (pInformation->NextEntryOffset == 0)
 				return;
