@@ -1,11 +1,12 @@
 """The Python package beside the command line and beside numbers by hand."""
-import ast
+import copy
 import logging
 import math
 import os
 import pathlib
 import re
 import subprocess
+import sys
 import threading
 
 import numpy as np
@@ -13,7 +14,8 @@ import pytest
 
 import retarget_setup as rs
 
-ROOT = pathlib.Path(__file__).resolve().parents[2]
+HERE = pathlib.Path(__file__).resolve().parent
+ROOT = HERE.parents[1]
 FBX = ROOT / "demo/character.fbx"
 SOURCE = ROOT / "demo/performer.qrs"
 TAKE = ROOT / "demo/walk.bvh"
@@ -40,9 +42,10 @@ def test_session_saves_what_the_command_line_saves(saved, tmp_path):
 
 @pytest.mark.parametrize("path", sorted((ROOT / "tests/data/qrt").glob("*.qrs")), ids=lambda path: path.name)
 def test_every_field_goes_through_python(path, tmp_path):
-    rs.read(path).write(tmp_path / "ours.qrs")
+    # A copy, under a name that is no text.
+    copy.deepcopy(rs.read(path)).write(tmp_path / "ours\udcff.qrs")
     retarget("convert", path, tmp_path / "theirs.qrs")
-    assert (tmp_path / "ours.qrs").read_bytes() == (tmp_path / "theirs.qrs").read_bytes()
+    assert (tmp_path / "ours\udcff.qrs").read_bytes() == (tmp_path / "theirs.qrs").read_bytes()
 
 
 def arm():
@@ -92,12 +95,15 @@ def test_proposed_and_aligned(saved):
     session = rs.load(saved, source=SOURCE)
     assert {"source": "Cranium", "target": "skull"}.items() <= next(
         pair for pair in session.propose()["pairs"] if pair["source"] == "Cranium").items()
-    before = session.target.subject
-    told = session.align(chains=["arms"], lock=["palmLeft"])
-    assert told and session.report["aligned"] == told
-    changed = {a.name for a, b in zip(before.segments, session.target.subject.segments)
-               if a.joint.bind_pose != b.joint.bind_pose}
-    assert "palmLeft" not in changed
+
+    def changed_by(**choice):
+        before = session.target.subject
+        told = session.align(**choice)
+        assert told and session.report["aligned"] == told
+        return {a.name for a, b in zip(before.segments, session.target.subject.segments)
+                if a.joint.bind_pose != b.joint.bind_pose}
+    assert changed_by(chains="arms", lock=["upperArmLeft"]) == {"foreArmLeft", "upperArmRight", "foreArmRight"}
+    assert {"upperArmLeft", "thighLeft"} <= changed_by()
 
 
 def broken(change):
@@ -132,6 +138,11 @@ def broken(change):
     (ValueError, "joint_type is no JointType",
      lambda path: broken(lambda file: setattr(file.subject.segments[0].joint, "joint_type", "Rubber")).check()),
     (TypeError, "segments is a text", lambda path: broken(lambda file: setattr(file.subject, "segments", "")).check()),
+    (TypeError, "a SkeletonFile is wanted here, not PosixPath", lambda path: rs.Kinematics(SOURCE)),
+    (TypeError, "a Take is wanted here, not str", lambda path: rs.create(FBX).solve("walk.bvh")),
+    (TypeError, "an edit is a name, or", lambda path: rs.create(FBX, edits=[("weight", 0, 2)])),
+    (ValueError, "frames count from 0", lambda path: rs.Take(TAKE).joint_poses(-1)),
+    (ValueError, "null character", lambda path: rs.read("a\0.qrs")),
     (AttributeError, "bindpose", lambda path: setattr(arm().subject.segments[0].joint, "bindpose", [])),
 ])
 def test_what_cannot_be_done_says_why_and_writes_nothing(kind, words, call, tmp_path):
@@ -178,19 +189,25 @@ def test_threads_share_a_session(saved):
     assert counts == [len(session.targets())] * 40
 
 
-def test_types_name_what_there_is():
-    types = ast.parse((pathlib.Path(rs.__file__).parent / "__init__.pyi").read_text(encoding="utf8"))
-    named = {getattr(node, "name", None) or node.target.id for node in types.body
-             if isinstance(node, (ast.ClassDef, ast.FunctionDef, ast.AnnAssign))}
-    assert named >= set(rs.__all__)
+def test_types_are_those_of_the_package_and_take_the_documents_example(tmp_path):
+    example = tmp_path / "example.py"
+    example.write_text(document_code(), encoding="utf8")
+    for command in (["mypy.stubtest", "--concise", "--allowlist", HERE / "types.allowed", "retarget_setup"],
+                    ["mypy", "--strict", f"--cache-dir={tmp_path}", example]):
+        done = subprocess.run([sys.executable, "-m", *map(str, command)], capture_output=True, text=True, cwd=tmp_path,
+                              env=os.environ | {"MYPYPATH": str(pathlib.Path(rs.__file__).parents[1])})
+        assert done.returncode == 0, done.stdout + done.stderr
+
+
+def document_code():
+    text = (ROOT / "docs/python.md").read_text(encoding="utf8")
+    return "\n".join(re.findall(r"```python\n(.*?)```", text, re.S))
 
 
 def test_the_documents_example(tmp_path, monkeypatch):
     for file in (FBX, SOURCE, TAKE):
         (tmp_path / file.name).symlink_to(file)
     monkeypatch.chdir(tmp_path)
-    text = (ROOT / "docs/python.md").read_text(encoding="utf8")
     scope = {}
-    for code in re.findall(r"```python\n(.*?)```", text, re.S):
-        exec(compile(code, "docs/python.md", "exec"), scope)  # noqa: S102
+    exec(compile(document_code(), "docs/python.md", "exec"), scope)  # noqa: S102
     assert (tmp_path / "kestrel.qrr").exists() and scope["worst"] < 1

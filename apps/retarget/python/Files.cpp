@@ -130,7 +130,10 @@ VSubjectFile FileFrom(const py::tuple& i_rParts)
 
 void DefineFiles(py::module_& io_rModule)
 {
-	py::class_<CoreOrlexQRTIO::VSubjectQRTExtras>(io_rModule, "Extras").def(py::init<>());
+	using VExtras = CoreOrlexQRTIO::VSubjectQRTExtras;
+	py::class_<VExtras>(io_rModule, "Extras")
+	    .def(py::init<>())
+	    .def("__deepcopy__", [](const VExtras& i_rExtras, const py::dict&) { return i_rExtras; });
 	io_rModule.def("read", &Read);
 	io_rModule.def("write", &Write);
 	io_rModule.def("check", &Check);

@@ -39,10 +39,22 @@ public:
 	{
 		const VEdits edits = ToEdits(i_rEdits);
 		const std::lock_guard lock(m_Mutex);
-		// Of edits that failed before.
-		m_Session.m_WithoutPartner.clear();
-		ApplyEdits(m_Session, edits);
-		ReportPose(m_Session);
+		Apply(edits);
+	}
+
+	/// Edits whose choice of what an alignment reaches ends with them.
+	void Align(const VEditPairs& i_rEdits)
+	{
+		struct VKept
+		{
+			~VKept() { m_rSession.m_Alignment = std::move(m_Choice); }
+			VSession& m_rSession;
+			RetargetSetup::VAlignmentChoice m_Choice = m_rSession.m_Alignment;
+		};
+		const VEdits edits = ToEdits(i_rEdits);
+		const std::lock_guard lock(m_Mutex);
+		const VKept kept{m_Session};
+		Apply(edits);
 	}
 
 	VSubjectFile Target()
@@ -113,6 +125,14 @@ public:
 	}
 
 private:
+	void Apply(const VEdits& i_rEdits)
+	{
+		// Of edits that failed before.
+		m_Session.m_WithoutPartner.clear();
+		ApplyEdits(m_Session, i_rEdits);
+		ReportPose(m_Session);
+	}
+
 	VEdits ToEdits(const VEditPairs& i_rEdits) const
 	{
 		SetupIO::VSetup setup;
@@ -181,6 +201,8 @@ void DefineSession(py::module_& io_rModule)
 	py::class_<VPythonSession, std::shared_ptr<VPythonSession>>(io_rModule, "Session")
 	    .def("edit",
 	        [](VPythonSession& io_rSession, const VEditPairs& i_rEdits) { Call([&] { io_rSession.Edit(i_rEdits); }); })
+	    .def("align",
+	        [](VPythonSession& io_rSession, const VEditPairs& i_rEdits) { Call([&] { io_rSession.Align(i_rEdits); }); })
 	    .def("target",
 	        [](VPythonSession& io_rSession)
 	        {

@@ -19,8 +19,8 @@ RETURNS = {
     "propose": "dict[str, Any]", "align": "dict[str, Any]", "solve": "Solved",
 }
 TAKES = {
-    "path": "Path", "fbx": "Path", "source": "Path | None", "subject": "Path", "root": "str | None",
-    "scale_root_height": "bool", "edits": "Edits", "version": "str | None", "name": "str", "value": "object",
+    "path": "_Path", "fbx": "_Path", "source": "_Path | None", "subject": "_Path", "root": "str | None",
+    "scale_root_height": "bool", "edits": "_Edits", "version": "str | None", "name": "str", "value": "object",
     "before": "SkeletonFile", "after": "SkeletonFile", "states": "ArrayLike", "file": "SkeletonFile", "text": "str",
     "status": "int", "application_data": "ApplicationData | None",
     "stack": "str | None", "up": "str | None", "unit": "float | None", "rate": "float | None", "take": "Take",
@@ -76,7 +76,7 @@ def of_class(made) -> list[str]:
 
 print("import dataclasses\nimport enum\nimport os\nfrom collections.abc import Iterable\nfrom typing import Any\n")
 print("import numpy as np\nfrom numpy.typing import ArrayLike, NDArray\n")
-print("Path = str | os.PathLike[str]\nEdits = Iterable[str | tuple[str, object]]\n\n__version__: str")
+print("_Path = str | bytes | os.PathLike[Any]\n_Edits = Iterable[str | tuple[str, object]]\n\n__version__: str")
 for name in sorted(retarget_setup.__all__, key=lambda name: not name.isupper()):
     value = getattr(retarget_setup, name)
     if inspect.isclass(value):

@@ -113,6 +113,40 @@ class Bone:
     matrix: object
 
 
+def _path(path):
+    """As the system has it, whether it is text or not."""
+    name = _os.fsencode(path)
+    if b"\0" in name:
+        raise ValueError("a path has a null character in it")
+    return name
+
+
+def _optional_path(path):
+    return None if path is None else _path(path)
+
+
+def _wanted(value, kind):
+    """The value, if it is of this class."""
+    if not isinstance(value, kind):
+        raise TypeError(f"a {kind.__name__} is wanted here, not {type(value).__name__}")
+    return value
+
+
+def _parts(file):
+    return _wanted(file, SkeletonFile)._parts()
+
+
+def _list(words):
+    """One word alone is a list of one."""
+    return [words] if isinstance(words, str) else list(words)
+
+
+def _frame(number):
+    if number is not None and number < 0:
+        raise ValueError("frames count from 0")
+    return number
+
+
 class SkeletonFile:
     """What a file of the skeleton family holds. Subject and application data may be changed at will: nothing is looked
     up before check, write or Kinematics. The lists of segments, markers and targets run parallel in both."""
@@ -136,7 +170,7 @@ class SkeletonFile:
     def write(self, path, version=None):
         """Writes a skeleton file at a version of the format ("3.5"; None: the lowest that holds it). The file that
         stands there is replaced when the whole of the new one stands on disk."""
-        _core.write(self._parts(), _os.fspath(path), version)
+        _core.write(self._parts(), _path(path), version)
 
     def check(self):
         """A list of Finding; empty for a well-formed subject."""
@@ -158,7 +192,7 @@ class Kinematics(_core.Kinematics):
     """
 
     def __init__(self, file):
-        super().__init__(file._parts())
+        super().__init__(_parts(file))
 
     def poses(self, states):
         """World poses of the segments as matrices, (segments, 4, 4)."""
@@ -181,7 +215,7 @@ class Take(_core.Take):
     """
 
     def __init__(self, path, stack=None, up=None, unit=None, rate=None):
-        super().__init__(_os.fspath(path), stack, up, unit, rate)
+        super().__init__(_path(path), stack, up, unit, rate)
 
     def joints(self):
         """Its joints, a list of (name, index of the parent or -1), parents first."""
@@ -189,7 +223,7 @@ class Take(_core.Take):
 
     def joint_poses(self, first=0, last=None):
         """World poses of its joints in the frames from first to last, (frames, joints, 4, 4)."""
-        return super().joint_poses(first, last)
+        return super().joint_poses(_frame(first), _frame(last))
 
     def poses(self, source, first=0, last=None, joints=(), rest_frame=None):
         """World poses of a performer's segments who moves by the take, (frames, segments, 4, 4).
@@ -198,7 +232,7 @@ class Take(_core.Take):
         (joint, segment) to that. In rest_frame the performer stands as in the bind pose; without it the take's rest pose
         counts.
         """
-        return super().poses(source._parts(), first, last, list(joints), rest_frame)
+        return super().poses(_parts(source), _frame(first), _frame(last), list(joints), _frame(rest_frame))
 
     def performer(self):
         """A performer's skeleton made of the take, as SkeletonFile."""
@@ -223,7 +257,9 @@ class Solved:
 def _edits(edits):
     """Names with or without dashes, alone or with their values."""
     pairs = []
-    for edit in edits:
+    for edit in _list(edits):
+        if not isinstance(edit, str) and (not isinstance(edit, (tuple, list)) or len(edit) != 2):
+            raise TypeError(f"an edit is a name, or (name, value), not {edit!r}")
         name, value = (edit, None) if isinstance(edit, str) else edit
         name = name.removeprefix("--")
         pairs.append((name.replace("_", "-"), None if value is None else str(value)))
@@ -255,7 +291,7 @@ class Session:
 
     @target.setter
     def target(self, file):
-        self._session.replace(file._parts())
+        self._session.replace(_parts(file))
 
     @property
     def source(self):
@@ -275,14 +311,17 @@ class Session:
 
     def align(self, chains=(), lock=()):
         """Brings the bind pose to the source's, as the edit "align" does: only some of "arms", "legs", "spine" and
-        "others" where chains are given, and never the segments in lock. Returns the angles before and after."""
-        self.edits([*(("chain", chain) for chain in chains), *(("lock", segment) for segment in lock), "align"])
+        "others" where chains are given, and never the segments in lock; both count for this call alone. Returns the
+        angles before and after."""
+        self._session.align(_edits([*(("chain", chain) for chain in _list(chains)),
+                                    *(("lock", segment) for segment in _list(lock)), "align"]))
         return self.report["aligned"]
 
     def solve(self, take, first=None, last=None, joints=(), rest_frame=None):
         """The character follows a Take in the frames from first to last, a Solved. The source moves by it, or without
         one a performer that is made of the take; joints and rest_frame as Take.poses has them."""
-        return Solved(*self._session.solve(take, first, last, list(joints), rest_frame))
+        return Solved(*self._session.solve(_wanted(take, Take), _frame(first), _frame(last), list(joints),
+                                           _frame(rest_frame)))
 
     def check(self):
         """A list of Finding about the retarget subject."""
@@ -296,26 +335,22 @@ class Session:
     def save(self, path):
         """Saves the retarget subject, the same bytes that the command line writes. The file that stands there is
         replaced when the whole of the new one stands on disk."""
-        self._session.save(_os.fspath(path))
-
-
-def _path(path):
-    return None if path is None else _os.fspath(path)
+        self._session.save(_path(path))
 
 
 def read(path):
     """Reads a skeleton file (.qrt, .qrk, .qrs, .qrr) or legacy text (.qrx)."""
-    return SkeletonFile._of(_core.read(_os.fspath(path)))
+    return SkeletonFile._of(_core.read(_path(path)))
 
 
 def compare(before, after):
     """In what two files differ, a list of Change; empty if in nothing."""
-    return [Change(*parts) for parts in _core.compare(before._parts(), after._parts())]
+    return [Change(*parts) for parts in _core.compare(_parts(before), _parts(after))]
 
 
 def bones(path):
     """The bones of an FBX file, a list of Bone, parents first."""
-    return [Bone(*parts) for parts in _core.bones(_os.fspath(path))]
+    return [Bone(*parts) for parts in _core.bones(_path(path))]
 
 
 def create(fbx, source=None, root=None, scale_root_height=False, edits=()):
@@ -324,12 +359,12 @@ def create(fbx, source=None, root=None, scale_root_height=False, edits=()):
     root is a bone by name or "#" and its index; None takes the document's choice, and with the edits "auto" or "preset"
     the one that the body hangs on.
     """
-    return Session(_core.make(_path(fbx), None, _path(source), root, scale_root_height, _edits(edits)))
+    return Session(_core.make(_path(fbx), None, _optional_path(source), root, scale_root_height, _edits(edits)))
 
 
 def load(subject, source=None, scale_root_height=False, edits=()):
     """A Session with a retarget subject from its file, as "retarget edit" loads it."""
-    return Session(_core.make(None, _path(subject), _path(source), None, scale_root_height, _edits(edits)))
+    return Session(_core.make(None, _path(subject), _optional_path(source), None, scale_root_height, _edits(edits)))
 
 
 def edit_kinds():
