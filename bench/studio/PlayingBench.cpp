@@ -2,6 +2,7 @@
 // waits for its time: pictures a second, and the longest that the window did not answer. What is solved already is the
 // same scene unsolved; beside it each picture is solved for itself, and while a sequence is solved. Then a take of
 // 100,000 frames is opened.
+#include "../DemoFiles.h"
 #include "../Verdict.h"
 
 #include "studio/host/Preferences.h"
@@ -14,11 +15,9 @@
 #include <QApplication>
 #include <QElapsedTimer>
 #include <QFile>
-#include <QProcess>
 #include <QQuickWidget>
 #include <QQuickWindow>
 #include <QSettings>
-#include <QTemporaryDir>
 #include <QTimer>
 
 #include <cstdio>
@@ -117,21 +116,15 @@ int main(int i_Count, char** i_ppArguments)
 	QCoreApplication::setAttribute(Qt::AA_ShareOpenGLContexts);
 	QApplication application(i_Count, i_ppArguments);
 	StudioHost::ApplyDarkStyle(application);
-	const QTemporaryDir folder;
-	const auto file = [&](const char* i_pName) { return folder.filePath(i_pName); };
-	for (const char* const pName : {"performer.qrs", "character.fbx", "walk.bvh"})
-		QFile::copy(QStringLiteral(RETARGET_DEMO "/") + pName, file(pName));
-	if (QProcess::execute(RETARGET_PROGRAM,
-	        {"create", "-q", "--fbx", file("character.fbx"), "--source", file("performer.qrs"), "--edits",
-	            RETARGET_DEMO "/mapping.json", "--prune-joints", "--match-file-pose", "--update-targets", "-o",
-	            file("kestrel.qrr")})
-	    != 0)
+	const VDemoFiles files;
+	if (!files.Make())
 		return 1;
+	const auto file = [&](const char* i_pName) { return files.Path(i_pName); };
 	WriteLongTake(file("long.bvh"));
 
 	QSettings settings(file("studio.ini"), QSettings::IniFormat);
 	StudioHost::VStudioWindow window(settings);
-	window.Context().Preferences().SetFolder("FolderSkins", folder.path().toStdString());
+	window.Context().Preferences().SetFolder("FolderSkins", files.Folder().toStdString());
 	if (!window.LoadModule(RETARGET_MODULE))
 		return 1;
 	window.resize(1280, 720);
