@@ -52,11 +52,10 @@ std::string AllVersionTexts()
 std::uint32_t LowestVersionValue(const CoreOrlexTypes::VSubjectParametrised& i_rSubject,
     const CoreOrlexTypes::VSubjectApplicationData& i_rApplicationData, const VSubjectQRTExtras& i_rExtras)
 {
-	using VSegment = CoreOrlexTypes::VSubjectParametrised::VSegment;
 	if (!i_rSubject.m_ModelVersion.empty() || !i_rApplicationData.m_RetargetSourceTemplate.empty()
 	    || !i_rApplicationData.m_RetargetSourceSubject.empty() || !i_rExtras.m_DynamicSubspaces.empty()
 	    || std::ranges::any_of(
-	        i_rSubject.m_Segments, [](const VSegment& i_rSegment) { return !i_rSegment.m_Joint.m_BindPose.empty(); })
+	        i_rSubject.m_Segments, [](const auto& i_rSegment) { return !i_rSegment.m_Joint.m_BindPose.empty(); })
 	    || std::ranges::any_of(i_rSubject.m_Targets,
 	        [](const VTarget& i_rTarget)
 	        {

@@ -208,7 +208,7 @@ void VRetargetSetupCore::CreateTargetSubject()
 	if (rotation)
 		std::copy(rotation->begin(), rotation->end(), rJoint.m_BindPose.begin());
 	for (int row = 0; row < 3; ++row)
-		rJoint.m_BindPose[std::size_t(3 + row)] = double(world(row, 3));
+		rJoint.m_BindPose[3 + std::size_t(row)] = double(world(row, 3));
 	rJoint.m_Mean = rJoint.m_BindPose;
 	if (bPoseFromFile)
 		RetargetSetup::MatchFilePoseAndTell(subject, bones, axis, rootFactor);

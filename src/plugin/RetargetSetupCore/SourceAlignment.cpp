@@ -47,6 +47,7 @@ std::vector<SetupProposal::VMappedJoints> MappedSegments(
 				mapped.emplace(rTarget.m_SegmentIndices[0], source->second);
 		}
 	std::vector<SetupProposal::VMappedJoints> pairs;
+	pairs.reserve(mapped.size());
 	for (const auto& [target, source] : mapped)
 		pairs.push_back({source, target});
 	return pairs;

@@ -58,7 +58,7 @@ VColourBytes ColourBytes(const QVector4D& i_rColour)
 	VColourBytes bytes;
 	for (int i = 0; i < 4; ++i)
 		bytes[static_cast<std::size_t>(i)] =
-		    static_cast<std::uint8_t>(std::clamp(i_rColour[i], 0.0f, 1.0f) * 255.0f + 0.5f);
+		    static_cast<std::uint8_t>(std::lround(std::clamp(i_rColour[i], 0.0f, 1.0f) * 255.0f));
 	return bytes;
 }
 
