@@ -278,5 +278,115 @@ TEST(Versions, LossesAreCounted)
 	        "2 rotation observations", "1 dynamic subspace"}));
 }
 
+/// Of a file of its own version nothing is lost; then it has one thing more, which that version does not hold.
+TEST(Versions, EachFieldThatIsLostIsTold)
+{
+	using VMarker = VSubjectParametrised::VMarker;
+	struct VParts
+	{
+		explicit VParts(VContent& io_rContent)
+		    : m_rSubject(io_rContent.m_Subject), m_rApp(io_rContent.m_ApplicationData)
+		{
+		}
+
+		VSubjectParametrised& m_rSubject;
+		VSubjectApplicationData& m_rApp;
+		VSubjectParametrised::VSegment& m_rSegment = m_rSubject.m_Segments.at(2);
+		VSubjectParametrised::VJoint& m_rJoint = m_rSegment.m_Joint;
+		VMarker& m_rMarker = m_rSubject.m_Markers.at(1);
+		VTarget& m_rTarget = m_rSubject.m_Targets.at(1);
+		VSubjectParametrised::VDynamicParameter& m_rParameter = m_rSubject.m_DynamicParameters.at(0);
+		VSubjectApplicationData::VSegment& m_rDraw = m_rApp.m_Segments.at(2);
+		VSubjectApplicationData::VStick& m_rStick = m_rApp.m_Sticks.at(0);
+		VSubjectApplicationData::VTarget& m_rShown = m_rApp.m_Targets.at(1);
+	};
+	const struct
+	{
+		const char* m_pVersion;
+		const char* m_pLoss;
+		std::vector<void (*)(VParts&)> m_Changes;
+	} rows[]{
+	    {"1.5", "1 pre pose",
+	        {[](VParts& r) { r.m_rSegment.m_PreRotation[0] = "1"; },
+	            [](VParts& r) { r.m_rSegment.m_PreTranslation[1] = "1"; }}},
+	    {"1.5", "1 post pose",
+	        {[](VParts& r) { r.m_rSegment.m_InversePostRotation[0] = 1; },
+	            [](VParts& r) { r.m_rSegment.m_InversePostTranslation[1] = 1; }}},
+	    {"1.0", "1 mass distribution",
+	        {[](VParts& r) { r.m_rSegment.m_MassExpression = "1"; },
+	            [](VParts& r) { r.m_rSegment.m_MassCentreExpressions[0] = "1"; },
+	            [](VParts& r) { r.m_rSegment.m_RadiusOfGyrationExpressions[0] = "1"; }}},
+	    {"2.0", "1 T-pose",
+	        {[](VParts& r) {
+		         r.m_rJoint.m_TPoseMean = {1, 1};
+	         },
+	            [](VParts& r) {
+		            r.m_rJoint.m_TPoseCovariance = {1, 0, 0, 1};
+	            }}},
+	    {"1.0", "1 joint template",
+	        {[](VParts& r) {
+		         r.m_rJoint.m_TemplateMean = {1, 1};
+	         },
+	            [](VParts& r) {
+		            r.m_rJoint.m_TemplateCovariance = {1, 0, 0, 1};
+	            }}},
+	    {"2.6", "1 joint range",
+	        {[](VParts& r) {
+		         r.m_rJoint.m_RangeCentringState = {1, 1};
+	         },
+	            [](VParts& r) {
+		            r.m_rJoint.m_RangeMatrix = {1, 0, 0, 1};
+	            },
+	            [](VParts& r) {
+		            r.m_rJoint.m_TemplateRangeCentringState = {1, 1};
+	            },
+	            [](VParts& r) {
+		            r.m_rJoint.m_TemplateRangeMatrix = {1, 0, 0, 1};
+	            }}},
+	    {"3.4", "1 bind pose", {[](VParts& r) {
+		     r.m_rJoint.m_BindPose = {1, 1};
+	     }}},
+	    {"1.0", "1 segment context", {[](VParts& r) { r.m_rDraw.m_Context = "Left"; }}},
+	    {"2.6", "1 segment draw setting",
+	        {[](VParts& r) { r.m_rDraw.m_Colour.m_Alpha = 3; }, [](VParts& r) { r.m_rDraw.m_Visible = false; },
+	            [](VParts& r) { r.m_rDraw.m_Part = "arm"; }, [](VParts& r) { r.m_rDraw.m_DrawEndRatio = 2; },
+	            [](VParts& r) { r.m_rDraw.m_DrawHeight = 2; }, [](VParts& r) { r.m_rDraw.m_DrawTwist = 2; },
+	            [](VParts& r) { r.m_rDraw.m_DrawWidth = 2; }}},
+	    {"1.0", "1 marker status setting",
+	        {[](VParts& r) { r.m_rMarker.m_Missing = true; },
+	            [](VParts& r) { r.m_rMarker.m_Status = VMarker::EOptional; }}},
+	    {"2.5", "1 marker view angle", {[](VParts& r) { r.m_rMarker.m_ViewAngle = 1; }}},
+	    {"2.6", "1 stick colour",
+	        {[](VParts& r) { r.m_rStick.m_ColourA.m_Red ^= 1; }, [](VParts& r) { r.m_rStick.m_ColourB.m_Red ^= 1; }}},
+	    {"2.6", "1 target weight", {[](VParts& r) { r.m_rTarget.m_Weight = 7; }}},
+	    {"1.0", "1 target covariance", {[](VParts& r) { r.m_rTarget.m_TemplateCovariance.assign(9, 1); }}},
+	    {"3.2", "1 placement covariance", {[](VParts& r) { r.m_rTarget.m_PlacementCovariance.assign(9, 1); }}},
+	    {"3.4", "1 calibration weight", {[](VParts& r) { r.m_rTarget.m_CalibrationWeight = 0.25; }}},
+	    {"2.6", "1 target display setting",
+	        {[](VParts& r) { r.m_rShown.m_Name = "x"; }, [](VParts& r) { r.m_rShown.m_Colour.m_Red ^= 1; },
+	            [](VParts& r) { r.m_rShown.m_Visible ^= true; }, [](VParts& r) { r.m_rShown.m_FillGaps ^= 1; }}},
+	    {"3.2", "the skin",
+	        {[](VParts& r) { r.m_rApp.m_Skin = "suit"; }, [](VParts& r) { r.m_rApp.m_SkinColourA.m_Red ^= 1; },
+	            [](VParts& r) { r.m_rApp.m_SkinColourB.m_Red ^= 1; }}},
+	    {"1.0", "1 dynamic parameter prior",
+	        {[](VParts& r) { r.m_rParameter.m_Prior += 1; }, [](VParts& r) { r.m_rParameter.m_StandardDeviation += 1; },
+	            [](VParts& r) { r.m_rParameter.m_Visible ^= true; }}},
+	    {"1.0", "1 static parameter",
+	        {[](VParts& r) { r.m_rSubject.m_StaticParameters.emplace_back().m_Name = "Unused"; }}},
+	};
+	for (const auto& rRow : rows)
+		for (const auto pChange : rRow.m_Changes)
+		{
+			VContent content = ReadText(DataText("version-" + std::string(rRow.m_pVersion) + ".qrs"));
+			VParts parts(content);
+			pChange(parts);
+			EXPECT_EQ(ListVersionLosses(content.m_Subject, content.m_ApplicationData, content.m_Extras,
+			              VersionValueFromText(rRow.m_pVersion).value())
+			              .m_Losses,
+			    VTexts({rRow.m_pLoss}))
+			    << rRow.m_pVersion << ' ' << rRow.m_pLoss;
+		}
+}
+
 } // namespace
 } // namespace CoreOrlexQRTIO
