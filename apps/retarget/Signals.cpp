@@ -24,7 +24,7 @@ void EndBySignal(int i_Signal)
 	LeaveProgress();
 	UtilsFileSystem::RemoveUnfinishedSaves();
 	// Its own handling takes effect when this returns.
-	std::signal(i_Signal, SIG_DFL);
+	static_cast<void>(std::signal(i_Signal, SIG_DFL));
 	std::raise(i_Signal);
 }
 
@@ -68,7 +68,7 @@ void LeaveNothingOnSignals()
 	};
 	for (const int signal : c_Signals)
 		if (std::signal(signal, EndBySignal) == SIG_IGN)
-			std::signal(signal, SIG_IGN);
+			static_cast<void>(std::signal(signal, SIG_IGN));
 }
 
 } // namespace CommandLine

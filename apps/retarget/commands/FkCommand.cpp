@@ -30,7 +30,7 @@ std::vector<double> State(const VFkSettings& i_rSettings, const VSubjectParametr
 {
 	if (!i_rSettings.m_State.empty())
 	{
-		const std::vector<double> state = ParseList(i_rSettings.m_State, "--state");
+		std::vector<double> state = ParseList(i_rSettings.m_State, "--state");
 		if (state.size() != i_Size)
 			throw VCommandError(EWrongUsage,
 			    "--state: the joints of \"" + i_rSettings.m_File + "\" take " + std::to_string(i_Size)

@@ -26,7 +26,7 @@ struct VMapSettings
 	std::string m_MinimumScore;
 };
 
-std::string KindOf(const VProposedPair& i_rPair)
+std::string PairKind(const VProposedPair& i_rPair)
 {
 	std::string text;
 	if (i_rPair.m_PositionWeight > 0.0)
@@ -54,7 +54,7 @@ std::string TableOf(const std::vector<VProposedPair>& i_rPairs, const VMapped& i
 	table.AddColumn("REASONS", VTable::ELeft);
 	for (const VProposedPair& rPair : i_rPairs)
 		table.AddRow({Fixed(rPair.m_Score, 2), i_rMapped.m_Source[rPair.m_Source].m_Name,
-		    i_rMapped.m_Target[rPair.m_Target].m_Name, KindOf(rPair), Joined(rPair.m_Reasons)});
+		    i_rMapped.m_Target[rPair.m_Target].m_Name, PairKind(rPair), Joined(rPair.m_Reasons)});
 	return table.Text(HasColours(STDOUT_FILENO));
 }
 

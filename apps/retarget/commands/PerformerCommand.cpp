@@ -17,7 +17,7 @@ namespace CommandLine
 namespace
 {
 
-constexpr double c_Degrees = 180.0 / std::numbers::pi;
+constexpr double c_ToDegrees = 180.0 / std::numbers::pi;
 
 struct VPerformerSettings
 {
@@ -46,7 +46,7 @@ EExitStatus WritePerformer(const VPerformerSettings& i_rSettings)
 	VJson feet = VJson::array();
 	for (const TakeSolve::VStandingFoot& rFoot : pose.m_Feet)
 		feet.push_back({{"joint", take.m_Joints[rFoot.m_Joint].m_Name}, {"standing", rFoot.m_Frames},
-		    {"turnDegrees", rounded(c_Degrees * rFoot.m_Turn)}, {"heightMm", rounded(rFoot.m_Height)}});
+		    {"turnDegrees", rounded(c_ToDegrees * rFoot.m_Turn)}, {"heightMm", rounded(rFoot.m_Height)}});
 	const std::string text = TextOf(pose, take);
 	PrintResult({{"output", i_rSettings.m_Out.m_Path}, {"segments", record.m_SubjectParametrised.m_Segments.size()},
 	                {"markers", record.m_SubjectParametrised.m_Markers.size()}, {"feet", feet}},

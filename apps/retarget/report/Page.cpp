@@ -119,8 +119,8 @@ void VPage::Pictures(const std::vector<std::string>& i_rCaptions, const std::vec
 	for (std::size_t i = 0; i < std::min(i_rCaptions.size(), i_rPngs.size()); ++i)
 	{
 		const std::string caption = EscapedForHtml(i_rCaptions[i]);
-		m_Text += "<figure><img alt=\"" + caption + "\" src=\"data:image/png;base64," + Base64(i_rPngs[i])
-		    + "\"><figcaption>" + caption + "</figcaption></figure>\n";
+		m_Text.append("<figure><img alt=\"").append(caption).append("\" src=\"data:image/png;base64,");
+		m_Text.append(Base64(i_rPngs[i])).append("\"><figcaption>").append(caption).append("</figcaption></figure>\n");
 	}
 	m_Text += "</div>\n";
 }

@@ -81,16 +81,20 @@ std::string Panel(const VSolveResult& i_rResult, bool i_bRotations, double i_Top
 		greatest = std::max(greatest, UnitFactor(rTargets[target]) * rQualities[target].m_Max);
 
 	std::string svg = Text(c_Left, i_Top - 8.0, "start", i_bRotations ? "degrees" : "mm", "#000000");
-	for (double value = 0.0; value <= greatest; value += StepOf(greatest))
+	const double step = StepOf(greatest);
+	for (int i = 0; i * step <= greatest; ++i)
 	{
+		// Three tenths are no sum of tenths, and shall read "0.3".
+		const double value = step < 1.0 ? i / std::round(1.0 / step) : i * step;
 		const double y = i_Top + c_Height * (1.0 - value / greatest);
 		svg += Line(c_Left, y, c_Left + c_Width, y) + Text(c_Left - 6.0, y + 4.0, "end", Shortest(value), "#000000");
 	}
 	const TakeSolve::VSolvedTake& rSolved = i_rResult.m_rSolved;
 	const double span = std::max(1.0, double(rSolved.m_Frames - 1));
-	for (double frame = 0.0; frame <= span; frame += std::max(1.0, StepOf(span)))
-		svg += Text(c_Left + c_Width * frame / span, i_Top + c_Height + 16.0, "middle",
-		    std::to_string(rSolved.m_First + std::size_t(frame)), "#000000");
+	const auto frames = std::size_t(std::max(1.0, StepOf(span)));
+	for (std::size_t frame = 0; double(frame) <= span; frame += frames)
+		svg += Text(c_Left + c_Width * double(frame) / span, i_Top + c_Height + 16.0, "middle",
+		    std::to_string(rSolved.m_First + frame), "#000000");
 	for (std::size_t i = targets.size(); i-- > 0;)
 	{
 		const bool bNamed = i < c_Colours.size();

@@ -241,13 +241,13 @@ VCandidates ScaleWords(const VTyped&, const std::string&)
 }
 
 /// By what a value is called in the help.
-struct VValue
+struct VOptionValue
 {
 	std::string_view m_Name;
 	VCandidates (*m_pCandidates)(const VTyped& i_rTyped, const std::string& i_rWord);
 };
 
-constexpr VValue c_Values[] = {
+constexpr VOptionValue c_Values[] = {
     {"ACTION", PresetActions},
     {"BEFORE AFTER", Files},
     {"CATEGORY=LEVEL", CategoryAndLevel},
@@ -314,7 +314,7 @@ VCandidates ValuesOf(const CLI::Option& i_rOption, const VTyped& i_rTyped, const
 		VNames words;
 		return Words(boost::algorithm::split(words, name, boost::algorithm::is_any_of("|")));
 	}
-	const auto* const pValue = std::ranges::find(c_Values, name, &VValue::m_Name);
+	const auto* const pValue = std::ranges::find(c_Values, name, &VOptionValue::m_Name);
 	return pValue == std::end(c_Values) ? VCandidates() : pValue->m_pCandidates(i_rTyped, i_rWord);
 }
 
@@ -444,7 +444,7 @@ std::string ValueName(const CLI::Option& i_rOption)
 bool IsKnownValue(const std::string& i_rName)
 {
 	return i_rName.empty() || IsListOfWords(i_rName)
-	    || std::ranges::find(c_Values, i_rName, &VValue::m_Name) != std::end(c_Values);
+	    || std::ranges::find(c_Values, i_rName, &VOptionValue::m_Name) != std::end(c_Values);
 }
 
 std::vector<VCandidate> Candidates(const CLI::App& i_rProgram, const std::vector<std::string>& i_rWords)

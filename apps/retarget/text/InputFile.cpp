@@ -35,7 +35,7 @@ boost::filesystem::path CopyOfStandardInput(std::uint64_t i_MaximumBytes)
 		if ((copied += count) > i_MaximumBytes)
 			break;
 	}
-	const boost::filesystem::path path = FinishScratchFile(pCopy);
+	boost::filesystem::path path = FinishScratchFile(pCopy);
 	if (std::ferror(stdin) || path.empty())
 		FailToCopy();
 	return path;
