@@ -8,6 +8,8 @@
 
 #include <gtest/gtest.h>
 
+#include <sys/stat.h>
+
 using namespace FBXIO;
 using namespace FbxTest;
 
@@ -109,7 +111,10 @@ TEST_P(Material, TexturesAreLookedForInTurn)
 	WritePicture("maps/skin.png", 1);
 	WritePicture("relative.png", 2);
 	WritePicture("skin.png", 3);
+	ASSERT_EQ(::mkfifo(Path("pipe.png").c_str(), 0600), 0);
+	boost::filesystem::create_symlink("/dev/zero", Path("link.png"));
 	const std::string absolute = Path("maps/skin.png");
+	const std::string upwards = "../../../../../../../../etc/passwd";
 	const struct
 	{
 		const char* m_pName;
@@ -124,7 +129,11 @@ TEST_P(Material, TexturesAreLookedForInTurn)
 	    {"beside the file", "/nowhere/skin.png", "gone.png", 3, Path("skin.png")},
 	    {"of another system", "C:\\art\\skin.png", "", 3, Path("skin.png")},
 	    {"nowhere", "/nowhere/lost.png", "gone.png", 0, Path("lost.png")},
-	    {"no picture", Path("hero.fbx"), "", 0, Path("hero.fbx")}, {"none", "", "", 0, ""}};
+	    {"no picture", Path("hero.fbx"), "", 0, Path("hero.fbx")}, {"none", "", "", 0, ""},
+	    {"of a server", R"(\\server\share\skin.png)", "", 3, Path("skin.png")},
+	    {"upwards", "/nowhere/x.png", upwards, 0, Path(upwards)}, {"a folder", Path("maps"), "", 0, Path("maps")},
+	    {"a pipe", Path("pipe.png"), "", 0, Path("pipe.png")}, {"a device", "/dev/zero", "", 0, "/dev/zero"},
+	    {"a link to one", "", "link.png", 0, Path("link.png")}};
 	for (const auto& rRow : rows)
 	{
 		SCOPED_TRACE(rRow.m_pName);

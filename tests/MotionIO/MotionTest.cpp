@@ -1,6 +1,6 @@
+#include "../FBXIO/MeshFile.h"
 #include "../UtilsFileSystem/Folder.h"
 #include "../UtilsFileSystem/Log.h"
-#include "../fbxsdk/FbxFileBuilder.h"
 #include "AssimpReader.h"
 #include "GltfRules.h"
 
@@ -363,6 +363,128 @@ TEST(MotionFiles, HoldTheSkin)
 		for (std::size_t axis = 0; axis < 6; ++axis)
 			EXPECT_NEAR(1000.0 * actual[axis / 3][axis % 3], expected[axis / 3][axis % 3], 0.1) << "mm, axis " << axis;
 	}
+}
+
+/// Pictures as they are, each once; a material for each look.
+TEST(MotionFiles, HoldPicturesAndMaterials)
+{
+	using namespace FbxTest;
+	VTestLog log("MotionIO");
+	const VTestFolder folder;
+	const auto path = [&](const char* i_pName) { return (folder / i_pName).string(); };
+	Put(path("skin.png"), "\x89PNG\r\n\x1a\n" + std::string("\0\0\0\rIHDR\0\0\0\1\0\0\0\1\x08\2\0\0\0\0\0\0\0", 25));
+	Put(path("coat.jpg"), std::string("\xff\xd8\xff\xc0\0\x11\x08\0\1\0\1", 11));
+	Put(path("hat.ppm"), "P6 1 1 255\nabc");
+	const VTestScene scene{
+	    {{"hips", "LimbNode", -1, {}}, {"body", "Mesh", 0, {}}, {"suit", "Mesh", 0, {}}, {"prop", "Null", -1, {}}},
+	    {{"UpAxis", {1}}, {"UnitScaleFactor", {1}}}, {}, {}};
+	const VNumbers points{0, 0, 0, 1, 0, 0, 0, 1, 0}, polygons{0, 1, -3, 0, 1, -3, 0, 1, -3, 0, 1, -3};
+	Put(path("hero.fbx"),
+	    Write(c_Forms[1], scene,
+	        {{1, points, polygons, {}, {}, {"ByPolygon", "IndexToDirect", {}, {0, 1, 2, 3}},
+	             {{"lambert", {{"TransparentColor", {1, 1, 1}}, {"TransparencyFactor", {0.25}}}, "", "skin.png"},
+	                 {"lambert", {{"EmissiveColor", {1, 1, 1}}}, "", "skin.png"}, {"lambert", {}, "", "coat.jpg"},
+	                 {"lambert", {}, "", "hat.ppm"}},
+	             {}},
+	            {2, points, {0, 1, -3}, {}, {}, {}, {}, {{3, {0, 1, 2}, {1, 1, 1}, {}, {}}}}}));
+	const VCharacterFile character = Character(path("hero.fbx"));
+	const VMoving moving(character);
+	std::string bytes, error;
+	ASSERT_EQ(PrintMotion(moving.m_Take, EMotionForm::Gltf, &character, {}, bytes, error), EPrinted::Done) << error;
+	EXPECT_EQ(BrokenGltfRule(bytes), "");
+	EXPECT_EQ(log.Take(),
+	    (std::vector<std::string>{"3 The character's skin is left out: no bone moves it",
+	        "3 The picture " + path("hat.ppm") + " is left out: it is neither PNG nor JPEG"}));
+	for (const auto& [text, count] : {std::pair("\"image/png\"", 1), {"\"image/jpeg\"", 1}, {"\"baseColorTexture\"", 3},
+	         {"\"source\"", 2}, {"\"alphaMode\":\"BLEND\"", 1}, {"0.75]", 1}, {"\"emissiveFactor\":[1.0,1.0,1.0]", 1},
+	         {"\"name\":\"body\"", 1}})
+	{
+		int found = 0;
+		for (std::size_t at = bytes.find(text); at != std::string::npos; at = bytes.find(text, at + 1))
+			++found;
+		EXPECT_EQ(found, count) << text;
+	}
+}
+
+TEST(MotionFiles, ThatCannotBeMadeAreRefused)
+{
+	const auto file = [](const std::vector<std::pair<std::string, FbxTest::VNumbers>>& i_rSettings)
+	{
+		return FbxTest::Write(
+		    FbxTest::c_Forms[1], FbxTest::VTestScene{{{"bone", "LimbNode", -1, {}}}, i_rSettings, {}, {}});
+	};
+	const VCharacterFile sound{"hero.fbx", file({})}, none{"hero.fbx", "none"},
+	    upX{"hero.fbx", file({{"UpAxis", {0}}})}, noUnit{"hero.fbx", file({{"UnitScaleFactor", {0}}})};
+	constexpr EMotionForm c_Bvh = EMotionForm::Bvh, c_Gltf = EMotionForm::Gltf, c_Fbx = EMotionForm::Fbx;
+	constexpr EPrinted c_Refused = EPrinted::Refused, c_Unreadable = EPrinted::CharacterUnreadable;
+	const auto stop = [](double) { return false; };
+	const struct
+	{
+		EMotionForm m_Form;
+		const VCharacterFile* m_pCharacter;
+		const char* m_pJoint;
+		VMotionSettings m_Settings;
+		EPrinted m_Printed;
+		std::string m_Why;
+	} rows[]{{c_Bvh, nullptr, nullptr, {}, c_Refused, "The motion has no frames"},
+	    {c_Bvh, nullptr, "bone", {"", 0.0, {}}, c_Refused, "A scale must be above 0"},
+	    {c_Gltf, nullptr, "bone", {}, c_Refused, "This form holds the character, too, whose FBX file is not given"},
+	    {c_Bvh, &none, "bone", {}, c_Unreadable, "It is no FBX file of version 6 or 7"},
+	    {c_Bvh, &upX, "bone", {}, c_Unreadable, "Its X axis points up, which is not read"},
+	    {c_Fbx, &noUnit, "bone", {}, c_Unreadable, "Its unit is none"},
+	    {c_Gltf, &sound, "other", {}, c_Refused, "No bone has the name of a joint of the motion"},
+	    {c_Fbx, &sound, "other", {}, c_Refused, "No bone has the name of a joint of the motion"},
+	    {c_Bvh, &sound, "bone", {"", 1.0, stop}, EPrinted::Cancelled, ""},
+	    {c_Gltf, &sound, "bone", {"", 1.0, stop}, EPrinted::Cancelled, ""},
+	    {c_Fbx, &sound, "bone", {"", 1.0, stop}, EPrinted::Cancelled, ""}};
+	for (const auto& rRow : rows)
+	{
+		VTake take;
+		if (rRow.m_pJoint)
+		{
+			take.m_Joints.emplace_back().m_Name = rRow.m_pJoint;
+			AddChannels(take, 0, true);
+			AddFrame(take, std::vector<VJointPose>(1));
+		}
+		std::string bytes = "as it was", why;
+		EXPECT_EQ(PrintMotion(take, rRow.m_Form, rRow.m_pCharacter, rRow.m_Settings, bytes, why), rRow.m_Printed)
+		    << rRow.m_Why;
+		EXPECT_EQ(why, rRow.m_Why);
+		EXPECT_EQ(bytes, "as it was");
+	}
+	EXPECT_EQ(MotionFormOf(".bvh"), c_Bvh);
+	EXPECT_EQ(MotionFormOf(".glb"), c_Gltf);
+	EXPECT_EQ(MotionFormOf(".fbx"), c_Fbx);
+	EXPECT_EQ(MotionFormOf(".qrr"), std::nullopt);
+}
+
+/// Of a motion at twice the size, with a joint that the character has not.
+TEST(MotionFiles, LeaveOutWhatHasNoBoneAndKeepEnds)
+{
+	VTestLog log("MotionIO");
+	const VCharacterFile character{"hero.fbx",
+	    FbxTest::Write(FbxTest::c_Forms[1],
+	        FbxTest::VTestScene{
+	            {{"bone", "LimbNode", -1, {}}}, {{"UpAxis", {2}}, {"UnitScaleFactor", {0.1}}}, {}, {}})};
+	VTake take, read;
+	take.m_Rate = 30.0;
+	take.m_FileUp = TakeIO::EUp::Z;
+	for (const char* pName : {"bone", "tail"})
+		take.m_Joints.emplace_back().m_Name = pName;
+	take.m_Joints[1].m_Parent = 0;
+	take.m_Joints[1].m_Ends = {{0, 0, 30}};
+	for (const std::size_t joint : {0, 1})
+		AddChannels(take, joint, joint == 0);
+	AddFrame(take, std::vector<VJointPose>(2));
+	std::string bytes, error;
+	ASSERT_EQ(PrintMotion(take, EMotionForm::Gltf, &character, {}, bytes, error), EPrinted::Done) << error;
+	EXPECT_EQ(log.Take(),
+	    std::vector<std::string>{"3 Joints of the motion that are left out, as the character has no bone of that name: "
+	                             "1, such as \"tail\""});
+	ASSERT_EQ(PrintMotion(take, EMotionForm::Bvh, &character, {"", 2.0, {}}, bytes, error), EPrinted::Done) << error;
+	ASSERT_TRUE(TakeIO::ReadTakeFrom(bytes, {TakeIO::EUp::Z, 1.0, {}}, read, error)) << error;
+	ASSERT_EQ(read.m_Joints[1].m_Ends.size(), 1u);
+	EXPECT_NEAR(read.m_Joints[1].m_Ends[0][2], 15.0, 1e-9);
 }
 
 } // namespace

@@ -200,6 +200,15 @@ TEST(BvhFile, ThatIsDamagedIsRefusedWithTheLine)
 	    {"\t}\n}\n", "\t}\n", "Line 15: MOTION stands inside the braces of \"Hips\""},
 	    {"\t}\n}\n", "\t}\n}\n}\n", "Line 16: A brace closes nothing"},
 	    {"JOINT", "ROOT", "Line 6: \"ROOT\" does not belong here"},
+	    {"JOINT", std::string(41, 'x'), "Line 6: \"" + std::string(40, 'x') + "...\" does not belong here"},
+	    {"Yrotation\n\t\tEnd", "Yrotation\nCHANNELS 1 Xrotation\n\t\tEnd",
+	        "Line 10: A second CHANNELS of \"Left Leg\""},
+	    {"\tCHANNELS 6", "JOINT a\n{\nCHANNELS 1 Xrotation\n}\nCHANNELS 6",
+	        "Line 9: CHANNELS must stand before the joints below \"Hips\""},
+	    {"CHANNELS 2", "CHANNELS -2", "Line 9: CHANNELS needs a count up to 12"},
+	    {"CHANNELS 2", "CHANNELS 1.5", "Line 9: CHANNELS needs a count up to 12"},
+	    {"Frames: 2", "Frames: x", "Line 17: A number is missing behind \"Frames\""},
+	    {"Frames: 2", "Frames : x", "Line 17: A number is missing behind \"Frames\""},
 	    {"-5 0", "-5", "Line 9: OFFSET needs three numbers, not \"CHANNELS\""},
 	    {"0 0 4", "0 0 nan", "Line 12: OFFSET needs three numbers, not \"nan\""},
 	    {"CHANNELS 2", "CHANNELS 13", "Line 9: CHANNELS needs a count up to 12"},
@@ -225,6 +234,11 @@ TEST(BvhFile, ThatIsDamagedIsRefusedWithTheLine)
 	std::string error;
 	EXPECT_FALSE(ReadTake("/nowhere/none.bvh", {}, take, error));
 	EXPECT_NE(error, "");
+	std::string many = c_Small;
+	for (int i = 0; i < 1000; ++i)
+		many += "1 2 3 90 0 0 90 90\n";
+	EXPECT_FALSE(ReadTakeFrom(many, {EUp::Y, 10.0, {}, {}, [](double i_Done) { return i_Done < 0.5; }}, take, error));
+	EXPECT_EQ(error.substr(error.find(": ") + 2), "The reading was ended");
 }
 
 /// A chain of more joints than are read, each inside the one before.

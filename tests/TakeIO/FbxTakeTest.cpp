@@ -91,7 +91,11 @@ TEST(FbxCurve, OfOldFilesHasTheValuesComputedByHand)
 	    {"U,s,3,1,n", "U,b,2,-1,n", "L", {{0.5, 3.25}, {2, 7.75}}},
 	    // The secants 6 and 1 by their times: 8 / 3 at the key within; straight at both ends.
 	    {"U,a,n", "U,a,n", "U,a,n", {{0.5, 3.4166666667}, {2, 7.4166666667}}},
-	    {"U,s,2,2,a,1,1", "L", "L", {{0.4375, 1.5}}}};
+	    {"U,s,2,2,a,1,1", "L", "L", {{0.4375, 1.5}}},
+	    // As in the later form, but that the last of three keys has one secant, 1: 7 + (3.5 - 1) 2 / 8.
+	    {"U,t,0,0,0,n", "U,t,0,0,0,n", "U,t,0,0,0,n", {{0.5, 3.3125}, {2, 7.625}}},
+	    // One side at a weight of 1/2, the other at 1/3: at s = 1/2 time is (1.5 + 1 + 1) / 8 or (1 + 1.5 + 2) / 8.
+	    {"U,s,3,1,l,0.5", "L", "L", {{0.4375, 3.1875}}}, {"U,s,3,1,r,0.5", "L", "L", {{0.5625, 3.4375}}}};
 	for (const auto& [first, second, third, values] : rows)
 	{
 		SCOPED_TRACE(first + ' ' + second);
@@ -106,7 +110,7 @@ TEST(FbxCurve, OfOldFilesHasTheValuesComputedByHand)
 			EXPECT_NEAR(curve.At(time * c_Second), value, 1e-6) << time;
 	}
 	for (const char* pKeys :
-	    {"", "0", "0,0", "0,0,X", "0,0,U,z,n", "0,0,U,s,1,1", "5,0,L,5,1,L", "0,nan,L", "0,1e10,L"})
+	    {"", "0", "0,0", "0,0,X", "0,0,U,z,n", "0,0,U,s,1,1", "0,0,U,s,1,1,z", "5,0,L,5,1,L", "0,nan,L", "0,1e10,L"})
 	{
 		const std::string bytes = std::string("; FBX 6.1.0 project file\nKey: ") + pKeys + "\n";
 		FbxFormat::VElementTree tree;
@@ -312,10 +316,101 @@ TEST(FbxTake, LayersAddAndOverride)
 	}
 }
 
+/// With the first that reads so replaced; told if nothing does.
+std::string With(std::string i_Text, const std::string& i_rFrom, const std::string& i_rTo)
+{
+	const std::size_t at = i_Text.find(i_rFrom);
+	EXPECT_NE(at, std::string::npos) << i_rFrom;
+	return at == std::string::npos ? i_Text : i_Text.replace(at, i_rFrom.size(), i_rTo);
+}
+
+/// Before version 7: x goes from 5 to 15 in a second, y stands at 90, z is not told of; what is unknown is passed over.
+const std::string c_OldTake = R"(; FBX 6.1.0 project file
+Objects: {
+	Model: "Model::hips", "LimbNode" {
+		Version: 232
+	}
+}
+Connections: {
+	Connect: "OO", "Model::hips", "Model::Scene"
+}
+Takes: {
+	Current: "one"
+	Take: "one" {
+		Other: 1
+		Model: "Model::nobody" {
+			Version: 1.1
+		}
+		Model: "Model::hips" {
+			Channel: "Visibility" {
+				Default: 1
+			}
+			Channel: "Transform" {
+				Channel: "T" {
+					Channel: "X" {
+						Default: 3
+						Key: 0,5,L,46186158000,15,L
+					}
+					Channel: "Y" {
+						Default: 90
+					}
+					Channel: "W" {
+						Default: 4
+					}
+				}
+				Channel: "Q" {
+					Default: 4
+				}
+			}
+		}
+	}
+}
+)";
+
+TEST(FbxTake, ChannelsOfOldFilesMove)
+{
+	VTake take;
+	std::string error;
+	ASSERT_TRUE(ReadTakeFrom(c_OldTake, {EUp::Z, 1.0, 2.0, {}}, take, error)) << error;
+	ASSERT_EQ(take.m_Frames, 3u);
+	for (const auto& [frame, x] : {std::pair(0u, 5.0), {1u, 10.0}, {2u, 15.0}})
+		for (std::size_t axis = 0; axis < 3; ++axis)
+			EXPECT_NEAR(LocalPose(take, 0, frame).t[axis], axis == 0 ? x : axis == 1 ? 90.0 : 0.0, 1e-9) << frame;
+	EXPECT_FALSE(ReadTakeFrom(With(c_OldTake, "15,L", "15,X"), {}, take, error));
+	EXPECT_EQ(error, "A curve of its stack \"one\" is damaged or too large");
+	EXPECT_FALSE(ReadTakeFrom(With(c_OldTake, "Take:", "Cake:"), {}, take, error));
+	EXPECT_EQ(error, "It holds no animation stack");
+}
+
+/// Without a word about how its keys are joined a curve is straight; any other gap makes it unreadable.
+TEST(FbxTake, CurvesThatAreDamagedAreRefused)
+{
+	const std::string file = TakeFile(c_Forms[4]);
+	const std::pair<const char*, const char*> rows[]{{"KeyTime: *4", "KeyTime: *5"}, {"KeyTime:", "NoTime:"},
+	    {"KeyValueFloat: *4", "KeyValueFloat: *3"}, {"KeyValueFloat:", "NoValueFloat:"},
+	    {"KeyAttrFlags: *1", "KeyAttrFlags: *2"}, {"KeyAttrFlags:", "NoAttrFlags:"},
+	    {"KeyAttrDataFloat: *4", "KeyAttrDataFloat: *5"}, {"KeyAttrDataFloat:", "NoAttrDataFloat:"},
+	    {"KeyAttrRefCount: *1", "KeyAttrRefCount: *2"}, {"KeyAttrRefCount:", "NoAttrRefCount:"},
+	    {"0,6,8,8", "0,6,8,1e10"}, {"138558474000", "46186158000"}};
+	for (const auto& [pFrom, pTo] : rows)
+	{
+		VTake take;
+		std::string error;
+		EXPECT_FALSE(ReadTakeFrom(With(file, pFrom, pTo), {{}, {}, {}, "walk"}, take, error)) << pTo;
+		EXPECT_EQ(error, "A curve of its stack \"walk\" is damaged or too large");
+	}
+	std::string straight = With(file, "a: 4\n", "a: 2\n");
+	for (const char* pName : {"KeyAttrFlags", "KeyAttrDataFloat", "KeyAttrRefCount"})
+		straight = With(straight, pName, "Nothing");
+	VTake take;
+	std::string error;
+	ASSERT_TRUE(ReadTakeFrom(straight, {{}, {}, 4.0, "walk"}, take, error)) << error;
+	EXPECT_NEAR(LocalPose(take, 0, 2).t[0], 30.0, 1e-9);
+}
+
 TEST(FbxTake, ThatCannotBeReadIsRefused)
 {
-	std::string damaged = TakeFile(c_Forms[4]);
-	damaged.replace(damaged.find("KeyValueFloat: *4"), 17, "KeyValueFloat: *3");
+	const auto stop = [](double) { return false; };
 	const std::tuple<std::string, VTakeSettings, std::string> rows[]{
 	    {TakeFile(c_Forms[1]), {{}, {}, {}, "run"}, "It has no such stack. It has: walk, other"},
 	    {TakeFile(c_Forms[1]), {{}, {}, {}, "other"}, "Nothing moves in its stack \"other\""},
@@ -323,7 +418,11 @@ TEST(FbxTake, ThatCannotBeReadIsRefused)
 	    {Write(c_Forms[0], VTestScene{}), {}, "It has no joints"},
 	    {"; FBX 5.8.0 project file\n", {}, "It is no FBX file of version 6 or 7"},
 	    {Write(c_Forms[1], VTestScene{}), {}, "It has no joints"},
-	    {damaged, {}, "A curve of its stack \"walk\" is damaged or too large"},
+	    {Write(c_Forms[1], VTestScene{{{"hips", "LimbNode", -1, {}}}, {{"UpAxis", {0}}}, {}, {}}), {},
+	        "Its X axis points up, which is not read"},
+	    {TakeFile(c_Forms[1]), {{}, 0.0, {}, "walk"}, "Its unit is none"},
+	    {TakeFile(c_Forms[1]), {{}, 1e14, {}, "walk"}, "Its joints are beyond any stage"},
+	    {TakeFile(c_Forms[1]), {{}, {}, 2000.0, "walk", stop}, "The reading was ended"},
 	    {TakeFile(c_Forms[1]).substr(0, 900), {},
 	        "The FBX file is damaged: a record reaches beyond what holds it (byte"}};
 	for (const auto& [bytes, settings, message] : rows)

@@ -28,6 +28,7 @@ struct VTargetsSettings
 void TellDisagreement(const std::vector<VTargetLine>& i_rLines)
 {
 	std::vector<VTargetResidual> residuals;
+	residuals.reserve(i_rLines.size());
 	for (const VTargetLine& rLine : i_rLines)
 		residuals.push_back(rLine.m_Residual);
 	const std::optional<std::size_t> worst = WorstDisagreement(residuals);

@@ -61,19 +61,19 @@ std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeTo
 }
 
 std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
-    std::shared_ptr<const TakeIO::VTake> i_pTake, const TakeSolve::VSourceSettings& i_rPairs)
+    const std::shared_ptr<const TakeIO::VTake>& i_rpTake, const TakeSolve::VSourceSettings& i_rPairs)
 {
-	const VSubjectParametrised performer = PerformerOf(i_rWhat, io_rSession, *i_pTake);
-	auto pPlayed = std::make_unique<VPlayedTake>(performer, io_rSession.Target(), i_pTake);
+	const VSubjectParametrised performer = PerformerOf(i_rWhat, io_rSession, *i_rpTake);
+	auto pPlayed = std::make_unique<VPlayedTake>(performer, io_rSession.Target(), i_rpTake);
 	RequireNoErrors();
 	const TakeSolve::VPosedSubject& rSource = pPlayed->m_Source;
 	const TakeSolve::VPosedSubject& rTarget = pPlayed->m_Target;
 	std::string error;
 	const auto pMotion =
-	    TakeSolve::VSourceMotion::Make(rSource.m_Subject, rSource.m_BindPose, i_pTake, i_rPairs, error);
+	    TakeSolve::VSourceMotion::Make(rSource.m_Subject, rSource.m_BindPose, i_rpTake, i_rPairs, error);
 	if (!pMotion)
 		throw VCommandError(EWrongUsage, error);
-	const auto [first, last] = FramesOrRefuse(i_rWhat, i_pTake->m_Frames);
+	const auto [first, last] = FramesOrRefuse(i_rWhat, i_rpTake->m_Frames);
 	if (rTarget.m_Subject.m_Targets.empty())
 		throw VCommandError(EBadInput, "\"" + i_rWhat.m_Subject + "\" has no targets: there is nothing to solve");
 	try

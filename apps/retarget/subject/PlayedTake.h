@@ -55,6 +55,6 @@ struct VPlayedTake
 std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat);
 /// The same with a take and its pairs that are there already.
 std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
-    std::shared_ptr<const TakeIO::VTake> i_pTake, const TakeSolve::VSourceSettings& i_rPairs);
+    const std::shared_ptr<const TakeIO::VTake>& i_rpTake, const TakeSolve::VSourceSettings& i_rPairs);
 
 } // namespace CommandLine

@@ -90,7 +90,7 @@ QString DefaultModulePath()
 	const QDir program(QCoreApplication::applicationDirPath());
 	for (const char* pFolder : {RETARGET_MODULE_IN_BUILD, RETARGET_MODULE_INSTALLED})
 	{
-		const QString path = QDir::cleanPath(program.filePath(QLatin1String(pFolder)));
+		QString path = QDir::cleanPath(program.filePath(QLatin1String(pFolder)));
 		if (QFileInfo(path).isFile())
 			return path;
 	}

@@ -18,7 +18,7 @@ namespace StudioHost
 namespace
 {
 
-constexpr const char* c_pCategory = "Motion";
+constexpr const char* c_pMotionCategory = "Motion";
 /// Milliseconds; screens show no more pictures.
 constexpr int c_Tick = 16;
 /// What is seen through.
@@ -51,7 +51,7 @@ VTakePlayer::VTakePlayer(NVX::CountedPointer<TesselPluginInterface::IItemFactory
 	    [this](const QStringList& i_rFindings, const QString& i_rError)
 	    {
 		    for (const QString& rFinding : i_rFindings)
-			    NVX_LOG(c_pCategory, NVX::ELogWarning, "%1%", rFinding.toStdString());
+			    NVX_LOG(c_pMotionCategory, NVX::ELogWarning, "%1%", rFinding.toStdString());
 		    if (!i_rError.isEmpty())
 		    {
 			    m_bJudging = false;

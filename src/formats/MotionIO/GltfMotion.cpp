@@ -248,10 +248,13 @@ private:
 		std::vector<std::int32_t> joints;
 		for (const FBXIO::VSkinBone& rBone : rSkeleton)
 			joints.push_back(BoneOf(rBone.m_Name));
-		if (rSkeleton.size() > c_MostBones || std::ranges::find(joints, -1) != joints.end())
+		if (rSkeleton.empty() || rSkeleton.size() > c_MostBones || std::ranges::find(joints, -1) != joints.end())
 		{
+			// The form has no skin without a joint.
 			NVX_LOG("MotionIO", NVX::ELogWarning, "The character's skin is left out: %1%",
-			    rSkeleton.size() > c_MostBones ? "more than 256 bones move it" : "some of its bones are unknown");
+			    rSkeleton.empty()                    ? "no bone moves it"
+			        : rSkeleton.size() > c_MostBones ? "more than 256 bones move it"
+			                                         : "some of its bones are unknown");
 			return;
 		}
 		std::vector<float> inverseBinds;

@@ -38,7 +38,7 @@ VRetargetSetupWidget::VRetargetSetupWidget(std::shared_ptr<TesselPluginInterface
     std::shared_ptr<TesselPluginInterface::IDataStore> i_pDataStore,
     std::shared_ptr<TesselPluginInterface::IParameterRegistry> i_pParameterRegistry,
     std::shared_ptr<TesselPluginInterface::IPreferenceFolders> i_pPreferenceFolders,
-    std::shared_ptr<TesselPluginInterface::IApplicationObject> /*i_pApplication*/,
+    const std::shared_ptr<TesselPluginInterface::IApplicationObject>& /*i_rpApplication*/,
     std::shared_ptr<TesselPluginInterface::IDispatcher> i_pDispatcher,
     std::shared_ptr<OrlexGraphics::VSkinCache> i_pSkinCache, std::shared_ptr<VRetargetSetup> i_pRetargetSetup,
     std::shared_ptr<VRetargetSetupSelection> i_pSelection, std::shared_ptr<VRetargetSetupScene> i_pScene,

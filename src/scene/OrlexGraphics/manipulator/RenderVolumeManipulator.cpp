@@ -27,10 +27,10 @@ namespace
 constexpr std::uint32_t c_VolumeSides = 16;
 
 // Sizes on the screen, in pixels at a scale of 1.
-constexpr float c_ShaftLength = 30.0f;
+constexpr float c_VolumeShaftLength = 30.0f;
 constexpr float c_VolumeShaftRadius = 1.0f;
 constexpr float c_VolumeHeadRadius = 6.0f;
-constexpr float c_HeadLength = 18.0f;
+constexpr float c_VolumeHeadLength = 18.0f;
 constexpr float c_CornerSide = 10.0f;
 constexpr float c_CentreSide = 14.0f;
 
@@ -38,9 +38,9 @@ constexpr float c_CentreSide = 14.0f;
 constexpr float c_LeastAngle = 0.1f;
 constexpr float c_OpacityOfRadian = 5.0f;
 
-const QVector3D c_HighlightColour(1.0f, 1.0f, 0.0f);
+const QVector3D c_VolumeHighlight(1.0f, 1.0f, 0.0f);
 
-CoreGraphics::VRenderState HandleState()
+CoreGraphics::VRenderState VolumeState()
 {
 	CoreGraphics::VRenderState state;
 	state.m_bDepthTest = true;
@@ -219,7 +219,7 @@ void VRenderVolumeManipulator::Render(
 		RenderBox(io_rContext);
 	if (!io_rContext.UseProgram(m_pDrawing->m_Program.Get(bPick)))
 		return;
-	io_rContext.ApplyState(bPick ? CoreGraphics::MakeSelectionState(HandleState()) : HandleState());
+	io_rContext.ApplyState(bPick ? CoreGraphics::MakeSelectionState(VolumeState()) : VolumeState());
 	std::size_t next = 0;
 	for (std::uint32_t group = 0; group < EVolumeHandleCount; ++group)
 	{
@@ -273,7 +273,7 @@ void VRenderVolumeManipulator::RenderHandle(VRenderContext& io_rContext, const V
 	{
 		const bool bHighlight =
 		    (i_rId.m_Id & (CoreGraphics::ESelectionIdSelected | CoreGraphics::ESelectionIdPreselected)) != 0;
-		io_rContext.SetUniform(rDrawing.m_ModelColour, QVector4D(bHighlight ? c_HighlightColour : m_Colour, opacity));
+		io_rContext.SetUniform(rDrawing.m_ModelColour, QVector4D(bHighlight ? c_VolumeHighlight : m_Colour, opacity));
 	}
 	const auto draw = [&](VShape& io_rShape, float i_Z, const QVector3D& i_rScale)
 	{
@@ -286,8 +286,9 @@ void VRenderVolumeManipulator::RenderHandle(VRenderContext& io_rContext, const V
 	};
 	if (i_rHandle.m_Group == EVolumeFace)
 	{
-		draw(rDrawing.m_Cylinder, 0.0f, QVector3D(c_VolumeShaftRadius, c_VolumeShaftRadius, c_ShaftLength));
-		draw(rDrawing.m_Cone, c_ShaftLength, QVector3D(c_VolumeHeadRadius, c_VolumeHeadRadius, c_HeadLength));
+		draw(rDrawing.m_Cylinder, 0.0f, QVector3D(c_VolumeShaftRadius, c_VolumeShaftRadius, c_VolumeShaftLength));
+		draw(rDrawing.m_Cone, c_VolumeShaftLength,
+		    QVector3D(c_VolumeHeadRadius, c_VolumeHeadRadius, c_VolumeHeadLength));
 		return;
 	}
 	const float side = i_rHandle.m_Group == EVolumeCorner ? c_CornerSide : c_CentreSide;
