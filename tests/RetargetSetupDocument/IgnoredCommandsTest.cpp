@@ -37,6 +37,8 @@ private:
 constexpr const char* c_NoSource = "There is no source subject. Choose a source skeleton first.";
 constexpr const char* c_NotItsFBX =
     "The segments of the target subject are not the bones of the FBX file. Choose the FBX file that it was made from.";
+constexpr const char* c_NoFile = "'' is no file on this computer.";
+constexpr const char* c_NoFBX = "No skeleton has been read from an FBX file. Choose a target FBX first.";
 constexpr const char* c_NoTarget = "There is no target subject. Create one, or open a retarget subject file.";
 
 TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
@@ -49,8 +51,21 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 		std::function<void()> m_Command;
 		std::string m_Reason;
 	} rows[] = {
-	    {"nothing", [] {}, "CreateTargetSubject", [this] { m_Document.CreateTargetSubject(); },
-	        "No skeleton has been read from an FBX file. Choose a target FBX first."},
+	    {"nothing", [] {}, "CreateTargetSubject", [this] { m_Document.CreateTargetSubject(); }, c_NoFBX},
+	    {"nothing", [] {}, "Advise", [this] { m_Document.Advise(); }, c_NoTarget},
+	    {"nothing", [] {}, "CheckPose", [this] { m_Document.CheckPose(); }, c_NoSource},
+	    {"nothing", [] {}, "ProposeTargets", [this] { m_Document.ProposeTargets(0.5); }, c_NoSource},
+	    {"nothing", [] {}, "Rebind", [this] { m_Document.Rebind(false, false); }, c_NoTarget},
+	    {"nothing", [] {}, "CompareWith", [this] { m_Document.CompareWith({}); }, c_NoFile},
+	    {"nothing", [] {}, "CompareWith", [this] { m_Document.CompareWith(Url("none.qrr")); }, c_NoTarget},
+	    {"nothing", [] {}, "FitPreset", [this] { m_Document.FitPreset({}, 0.5); }, c_NoFile},
+	    {"nothing", [] {}, "SavePreset", [this] { m_Document.SavePresetURL({}); }, c_NoFile},
+	    {"nothing", [] {}, "SavePreset", [this] { m_Document.SavePresetURL(Url("a.json")); }, c_NoTarget},
+	    {"nothing", [] {}, "SaveRecipe", [this] { m_Document.SaveRecipeURL({}); }, c_NoFile},
+	    {"nothing", [] {}, "RestoreTargetSubjectURL", [this] { m_Document.RestoreTargetSubjectURL({}, {}); }, c_NoFile},
+	    {"nothing", [] {}, "RestoreTargetSubjectURL",
+	        [this] { m_Document.RestoreTargetSubjectURL(Url("none.qrr"), {}); },
+	        "'" + File("none.qrr") + "' could not be loaded. The target subject is still the one before."},
 	    {"nothing", [] {}, "AddTarget", [this] { m_Document.AddTarget(0, 0, true, true); }, c_NoSource},
 	    {"nothing", [] {}, "RemoveTarget", [this] { m_Document.RemoveTarget(0); }, c_NoTarget},
 	    {"nothing", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); }, c_NoSource},
@@ -74,8 +89,17 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	        },
 	        "AddTarget", [this] { m_Document.AddTarget(0, 0, true, true); }, c_NoTarget},
 	    {"a source", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); }, c_NoTarget},
+	    {"a source", [] {}, "CheckPose", [this] { m_Document.CheckPose(); }, c_NoTarget},
+	    {"a source", [] {}, "ProposeTargets", [this] { m_Document.ProposeTargets(0.5); }, c_NoTarget},
 	    {"both", [this] { SetSmallSubjects(); }, "AddTarget", [this] { m_Document.AddTarget(-1, 0, true, true); },
 	        "No single segment of the source subject is selected."},
+	    {"both", [] {}, "FitPreset", [this] { m_Document.FitPreset(Url("none.json"), 0.5); },
+	        "'" + File("none.json") + "' could not be read as a preset: Could not read '" + File("none.json")
+	            + "': No such file or directory"},
+	    {"both", [] {}, "SavePreset", [this] { m_Document.SavePresetURL(Url("no/such/a.json")); },
+	        "The target subject has no position or rotation target that a preset could hold. Add targets first."},
+	    {"both", [] {}, "CompareWith", [this] { m_Document.CompareWith(Url("none.qrr")); },
+	        "'" + File("none.qrr") + "' could not be read as a retarget subject."},
 	    {"both", [] {}, "MatchFilePose", [this] { m_Document.MatchFilePose(); }, c_NotItsFBX},
 	    {"both", [] {}, "RemoveJoint", [this] { m_Document.RemoveJoint(0); },
 	        "The target subject has no such segment with a joint that can go; the root's stays."},

@@ -261,6 +261,7 @@ void VStudioWindow::MakeToolsMenu()
 std::vector<std::string> VStudioWindow::Dialogs()
 {
 	std::vector<std::string> names;
+	names.reserve(std::size(c_Dialogs));
 	for (const auto& [pName, pShow] : c_Dialogs)
 		names.emplace_back(pName);
 	return names;
