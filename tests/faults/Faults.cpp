@@ -3,12 +3,14 @@
 //
 // RETARGET_FAULT holds "KIND ACTION FIRST LAST COUNTER [FOLDER]": the calls FIRST to LAST of that kind, 1 the first,
 // are struck; COUNTER is a file of eight bytes in which they are counted, also beyond the program's death. ACTION is
-// the number of an error, "kill", or "vanish", which gives FOLDER another name and lets the call go on.
+// the number of an error, "kill", "vanish", which gives FOLDER another name and lets the call go on, or "swap", which
+// first puts the link FOLDER.link in the place of FOLDER/out.qrr.
 
 #include <cerrno>
 #include <csignal>
 #include <cstddef>
 #include <cstdint>
+#include <cstdio>
 #include <cstdlib>
 #include <cstring>
 
@@ -82,6 +84,7 @@ constexpr VKind c_Kinds[] = {
 
 constexpr int c_Kill = -1;
 constexpr int c_Vanish = -2;
+constexpr int c_Swap = -3;
 
 struct VPlan
 {
@@ -92,8 +95,9 @@ struct VPlan
 	std::uint64_t m_Last = 0;
 	/// Null while nothing is counted.
 	std::uint64_t* m_pCounter = nullptr;
-	char m_Folder[1024] = {};
-	char m_Gone[1040] = {};
+	/// The old and the new name of what is renamed.
+	char m_From[1040] = {};
+	char m_To[1040] = {};
 };
 VPlan s_Plan;
 std::uint64_t* s_pCounter = nullptr;
@@ -113,8 +117,8 @@ int Strike(bool i_bWrites = false, const long* i_pArguments = nullptr)
 			RawCall(SYS_write, i_pArguments[0], i_pArguments[1], i_pArguments[2] / 2, 0, 0, 0);
 		RawCall(SYS_kill, getpid(), SIGKILL, 0, 0, 0, 0);
 	}
-	if (s_Plan.m_Action == c_Vanish)
-		RawCall(SYS_rename, long(s_Plan.m_Folder), long(s_Plan.m_Gone), 0, 0, 0, 0);
+	if (s_Plan.m_Action == c_Vanish || s_Plan.m_Action == c_Swap)
+		RawCall(SYS_rename, long(s_Plan.m_From), long(s_Plan.m_To), 0, 0, 0, 0);
 	return s_Plan.m_Action > 0 ? s_Plan.m_Action : 0;
 }
 
@@ -188,14 +192,15 @@ __attribute__((constructor)) void Begin()
 	const char* const pAction = fields[1];
 	s_Plan.m_Action = std::strcmp(pAction, "kill") == 0 ? c_Kill
 	    : std::strcmp(pAction, "vanish") == 0           ? c_Vanish
+	    : std::strcmp(pAction, "swap") == 0             ? c_Swap
 	                                                    : std::atoi(pAction);
 	s_Plan.m_First = std::strtoull(fields[2], nullptr, 10);
 	s_Plan.m_Last = std::strtoull(fields[3], nullptr, 10);
 	if (fields[5])
 	{
-		std::strncpy(s_Plan.m_Folder, fields[5], sizeof(s_Plan.m_Folder) - 1);
-		std::strcpy(s_Plan.m_Gone, s_Plan.m_Folder);
-		std::strcat(s_Plan.m_Gone, ".gone");
+		const bool bSwap = s_Plan.m_Action == c_Swap;
+		std::snprintf(s_Plan.m_From, sizeof(s_Plan.m_From), "%s%s", fields[5], bSwap ? ".link" : "");
+		std::snprintf(s_Plan.m_To, sizeof(s_Plan.m_To), "%s%s", fields[5], bSwap ? "/out.qrr" : ".gone");
 	}
 	const int counter = open(fields[4], O_RDWR | O_CLOEXEC);
 	void* const pCounter = mmap(nullptr, sizeof(std::uint64_t), PROT_READ | PROT_WRITE, MAP_SHARED, counter, 0);

@@ -213,8 +213,11 @@ int WriteAll(int i_Descriptor, std::string_view i_Bytes)
 int CopyRights(int i_Descriptor, const boost::filesystem::path& i_rModel)
 {
 	struct stat model = {};
-	if (::stat(i_rModel.c_str(), &model) != 0)
+	if (::lstat(i_rModel.c_str(), &model) != 0)
 		return errno;
+	// Links were followed before: this one came since, and what it leads to is not what is saved.
+	if (S_ISLNK(model.st_mode))
+		return ELOOP;
 	const bool bOwner = ::fchown(i_Descriptor, model.st_uid, model.st_gid) == 0;
 	const bool bGroup = bOwner || ::fchown(i_Descriptor, uid_t(-1), model.st_gid) == 0;
 	// With another owner, the marks that run a program as its owner must not stay.
