@@ -74,10 +74,12 @@ def test_poses_of_many_frames():
     assert kinematics.bind_pose() == pytest.approx([0, 0, 0, 0, 0, 0, 0, 0, 0.5])
 
 
-def test_a_take_is_solved_as_on_the_command_line(saved):
+def test_a_take_is_solved_as_on_the_command_line(saved, tmp_path):
     session, take = rs.load(saved, source=SOURCE), rs.Take(TAKE)
-    solved = session.solve(take, first=10, last=19)
-    lines = retarget("solve", saved, "--take", TAKE, "--source", SOURCE, "--frames", "10:19", "--csv").splitlines()[1:]
+    solved = session.solve(take, first=10, last=19, output=tmp_path / "ours.glb", fbx=FBX)
+    lines = retarget("solve", saved, "--take", TAKE, "--source", SOURCE, "--frames", "10:19", "--csv", "--fbx", FBX,
+                     "-o", tmp_path / "theirs.glb").splitlines()[1:]
+    assert (tmp_path / "ours.glb").read_bytes() == (tmp_path / "theirs.glb").read_bytes()
     told = np.array([[float(cell or "nan") for cell in line.split(",")[4:]] for line in lines])
     units = np.array([math.radians(1) if target["unit"] == "deg" else 1 for target in solved.report["targets"]])
     assert solved.residuals == pytest.approx(told * units, abs=1e-6, nan_ok=True) and solved.first == 10
@@ -140,6 +142,8 @@ def broken(change):
     (TypeError, "segments is a text", lambda path: broken(lambda file: setattr(file.subject, "segments", "")).check()),
     (TypeError, "a SkeletonFile is wanted here, not PosixPath", lambda path: rs.Kinematics(SOURCE)),
     (TypeError, "a Take is wanted here, not str", lambda path: rs.create(FBX).solve("walk.bvh")),
+    (rs.Error, "that form holds the character, too", lambda path: rs.create(FBX, SOURCE, edits=["auto"]).solve(
+        rs.Take(TAKE), last=3, output=path / "walk.glb")),
     (TypeError, "an edit is a name, or", lambda path: rs.create(FBX, edits=[("weight", 0, 2)])),
     (ValueError, "frames count from 0", lambda path: rs.Take(TAKE).joint_poses(-1)),
     (ValueError, "null character", lambda path: rs.read("a\0.qrs")),

@@ -12,8 +12,6 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "NVX/Status.h"
-#include "RetargetSetupCore/GlobalScale.h"
-#include "TakeSolve/SolvedMotion.h"
 #include "UtilsFileSystem/Paths.h"
 #include "UtilsFileSystem/SaveFile.h"
 
@@ -117,13 +115,8 @@ EExitStatus Solve(VSolveSettings i_Settings)
 	const std::unique_ptr<const VPlayedTake> pPlayed = PlayTake(session, i_rSettings.m_What);
 	const VSolveResult result = pPlayed->Result();
 
-	if (!i_Settings.m_Motion.m_Path.empty())
-	{
-		i_Settings.m_Motion.m_Scale = RetargetSetup::GetGlobalScale(session.Target());
-		WriteMotionFile(TakeSolve::MotionOf(pPlayed->m_Target.m_Subject, pPlayed->m_Target.m_BindPose,
-		                    pPlayed->m_Solved, pPlayed->m_pTake->m_Rate),
-		    i_Settings.m_Motion);
-	}
+	if (!i_rSettings.m_Motion.m_Path.empty())
+		WriteSolvedMotion(session, *pPlayed, i_rSettings.m_Motion);
 	if (!i_rSettings.m_Plot.m_Path.empty())
 	{
 		RequireNoErrors();

@@ -105,7 +105,7 @@ void Tell(const VMessages& i_rMessages)
 
 } // namespace
 
-void Call(const std::function<void()>& i_rWork)
+void Call(const std::function<void()>& i_rWork, bool i_bForgive)
 {
 	SetLevel();
 	VMessages messages;
@@ -141,7 +141,7 @@ void Call(const std::function<void()>& i_rWork)
 	{
 		Raise(rError.what() + (errors.empty() ? "" : "\n" + errors), rError.Status());
 	}
-	if (!errors.empty())
+	if (!errors.empty() && !i_bForgive)
 		Raise(errors, EBadInput);
 }
 

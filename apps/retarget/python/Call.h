@@ -10,7 +10,8 @@ namespace CommandLine::Python
 /// they tell on other threads with the next call. Work that throws VCommandError, or tells an error, ends in the
 /// package's exception Error with that text. What throws otherwise comes to Python as pybind11 has it.
 /// @param i_rWork touches nothing of Python.
-void Call(const std::function<void()>& i_rWork);
+/// @param i_bForgive errors that are told are no failure: the work throws if it has failed.
+void Call(const std::function<void()>& i_rWork, bool i_bForgive = false);
 
 /// The exception that Call raises, made by the package: takes the text and the exit status.
 void RegisterError(const void* i_pType);

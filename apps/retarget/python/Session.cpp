@@ -117,6 +117,12 @@ public:
 		return PlayTake(m_Session, what, i_rTake.m_pTake, i_rSettings);
 	}
 
+	void WriteMotion(const VPlayedTake& i_rPlayed, const VMotionOutput& i_rOutput)
+	{
+		const std::lock_guard lock(m_Mutex);
+		WriteSolvedMotion(m_Session, i_rPlayed, i_rOutput);
+	}
+
 	/// What edits have told.
 	std::string Report()
 	{
@@ -153,16 +159,30 @@ py::object FromJson(const std::string& i_rText)
 
 /// (first frame, rate, states, residuals, iterations, converged, what "solve --json" prints)
 py::tuple Solved(VPythonSession& io_rSession, const VPythonTake& i_rTake, std::optional<std::size_t> i_First,
-    std::optional<std::size_t> i_Last, const VJointNames& i_rJoints, std::optional<std::size_t> i_RestFrame)
+    std::optional<std::size_t> i_Last, const VJointNames& i_rJoints, std::optional<std::size_t> i_RestFrame,
+    const std::optional<std::string>& i_rOutput, const std::optional<std::string>& i_rFbx)
 {
+	VMotionOutput output;
+	if (i_rOutput)
+	{
+		output.m_Path = FilePath(*i_rOutput);
+		output.m_bForce = true;
+		output.m_Character = i_rFbx ? FilePath(*i_rFbx) : "";
+		output.m_Name = StemOf(i_rTake.m_Path);
+	}
 	std::unique_ptr<const VPlayedTake> pPlayed;
 	std::string json;
 	Call(
 	    [&]
 	    {
+		    if (i_rOutput)
+			    CheckMotionOutput(output, {i_rTake.m_Path, output.m_Character});
 		    pPlayed = io_rSession.Solve(i_rTake, i_First, i_Last, ToSettings(i_rJoints, i_RestFrame));
 		    json = JsonText(SolveToJson(pPlayed->Result()));
 	    });
+	// A picture that is missing is missed, and no reason to have nothing.
+	if (i_rOutput)
+		Call([&] { io_rSession.WriteMotion(*pPlayed, output); }, true);
 	const TakeSolve::VSolvedTake& rSolved = pPlayed->m_Solved;
 	const auto frames = py::ssize_t(rSolved.m_Frames);
 	return py::make_tuple(rSolved.m_First, i_rTake.m_pTake->m_Rate,

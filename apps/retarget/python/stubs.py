@@ -25,7 +25,7 @@ TAKES = {
     "status": "int", "application_data": "ApplicationData | None",
     "stack": "str | None", "up": "str | None", "unit": "float | None", "rate": "float | None", "take": "Take",
     "first": "int | None", "last": "int | None", "joints": "Iterable[tuple[str, str]]", "rest_frame": "int | None",
-    "chains": "Iterable[str]", "lock": "Iterable[str]",
+    "output": "_Path | None", "chains": "Iterable[str]", "lock": "Iterable[str]",
 }
 
 
@@ -50,7 +50,7 @@ def of_class(made) -> list[str]:
             lines.append(f"{field.name}: {kind}" + ("" if frozen else " = ..."))
         head = ["@dataclasses.dataclass(frozen=True)" if frozen else "@dataclasses.dataclass"]
         return head + [f"class {made.__name__}:"] + ["    " + line for line in lines]
-    takes = dict(TAKES, subject="Subject | None")
+    takes = dict(TAKES, subject="Subject | None", fbx="_Path | None")
     if made is retarget_setup.Error:
         lines.append("status: int")
     if made is retarget_setup.Kinematics:

@@ -7,7 +7,9 @@
 
 #include "ComputeSubjectFK/ConstructionException.h"
 #include "DebugServices/GlobalLog.h"
+#include "RetargetSetupCore/GlobalScale.h"
 #include "TakeSolve/Performer.h"
+#include "TakeSolve/SolvedMotion.h"
 
 #include <utility>
 
@@ -105,6 +107,14 @@ std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeTo
 	for (std::size_t i = 0; i < rTarget.m_Subject.m_Targets.size(); ++i)
 		pPlayed->m_TargetNames.push_back(i < rNamed.size() ? rNamed[i].m_Name : std::string());
 	return pPlayed;
+}
+
+void WriteSolvedMotion(const VSession& i_rSession, const VPlayedTake& i_rPlayed, VMotionOutput i_Output)
+{
+	i_Output.m_Scale = RetargetSetup::GetGlobalScale(i_rSession.Target());
+	WriteMotionFile(TakeSolve::MotionOf(i_rPlayed.m_Target.m_Subject, i_rPlayed.m_Target.m_BindPose, i_rPlayed.m_Solved,
+	                    i_rPlayed.m_pTake->m_Rate),
+	    i_Output);
 }
 
 } // namespace CommandLine

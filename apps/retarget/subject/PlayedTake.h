@@ -3,6 +3,7 @@
 #include "retarget/subject/Session.h"
 #include "retarget/subject/SolveText.h"
 #include "retarget/subject/TakeFile.h"
+#include "retarget/text/MotionFile.h"
 
 #include "TakeIO/ReadTake.h"
 #include "TakeSolve/PosedSubject.h"
@@ -56,5 +57,8 @@ std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeTo
 /// The same with a take and its pairs that are there already.
 std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeToPlay& i_rWhat,
     const std::shared_ptr<const TakeIO::VTake>& i_rpTake, const TakeSolve::VSourceSettings& i_rPairs);
+
+/// Writes the character's motion as WriteMotionFile does, at the size of the session's subject.
+void WriteSolvedMotion(const VSession& i_rSession, const VPlayedTake& i_rPlayed, VMotionOutput i_Output);
 
 } // namespace CommandLine

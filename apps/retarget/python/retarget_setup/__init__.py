@@ -317,11 +317,12 @@ class Session:
                                     *(("lock", segment) for segment in _list(lock)), "align"]))
         return self.report["aligned"]
 
-    def solve(self, take, first=None, last=None, joints=(), rest_frame=None):
+    def solve(self, take, first=None, last=None, joints=(), rest_frame=None, output=None, fbx=None):
         """The character follows a Take in the frames from first to last, a Solved. The source moves by it, or without
-        one a performer that is made of the take; joints and rest_frame as Take.poses has them."""
+        one a performer that is made of the take; joints and rest_frame as Take.poses has them. The character's motion
+        goes to output, a path that ends in .bvh, or with the character's FBX file in .glb or .fbx."""
         return Solved(*self._session.solve(_wanted(take, Take), _frame(first), _frame(last), list(joints),
-                                           _frame(rest_frame)))
+                                           _frame(rest_frame), _optional_path(output), _optional_path(fbx)))
 
     def check(self):
         """A list of Finding about the retarget subject."""
