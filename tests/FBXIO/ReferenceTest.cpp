@@ -10,6 +10,7 @@
 #include <array>
 #include <cmath>
 #include <filesystem>
+#include <limits>
 #include <map>
 #include <set>
 
@@ -166,10 +167,24 @@ TEST_P(ReferenceFile, ClustersAgree)
 		EXPECT_EQ(counts[rMesh["name"]], rMesh["skinClusters"]) << rMesh["name"];
 }
 
+/// Of what a bone carries, the point that is farthest down one of its axes, against vertices as they are drawn: not
+/// above those that it surely carries, nor below those that it may carry.
+void ExpectCarried(const VSkinBone& i_rBone, double i_Surely, double i_Maybe)
+{
+	double lowest = std::numeric_limits<double>::max();
+	if (i_rBone.m_Skin->m_pCarried)
+		for (const auto& rPoint : *i_rBone.m_Skin->m_pCarried)
+			lowest = std::min(lowest, double(rPoint[2]));
+	EXPECT_LE(lowest, i_Surely + 0.1) << i_rBone.m_Name;
+	EXPECT_GE(lowest, i_Maybe - 0.1) << i_rBone.m_Name;
+}
+
 /// What bones move, against the vertices as they are drawn, whose weights are rounded.
 void ExpectBoneSkins(const VSkin& i_rSkin)
 {
 	std::vector<std::array<double, 4>> sums(i_rSkin.m_pSkeleton->size());
+	constexpr double c_None = std::numeric_limits<double>::max();
+	std::vector<std::array<double, 2>> lowest(sums.size(), {c_None, c_None});
 	double whole = 0.0;
 	for (const VSkinMesh& rMesh : i_rSkin.m_Meshes)
 	{
@@ -192,7 +207,12 @@ void ExpectBoneSkins(const VSkin& i_rSkin)
 						place += rBind(row, column) * rVertex.m_Position[std::size_t(column)];
 						scale += rBind(row, column) * rBind(row, column);
 					}
-					rSum[std::size_t(row)] += weight * place / std::sqrt(scale);
+					place /= std::sqrt(scale);
+					rSum[std::size_t(row)] += weight * place;
+					for (const int maybe : {0, 1})
+						if (double& rLowest = lowest[rVertex.m_BoneIndices[i]][std::size_t(maybe)];
+						    row == 2 && weight >= (maybe ? 118.0 : 138.0))
+							rLowest = std::min(rLowest, place);
 				}
 			}
 	}
@@ -203,6 +223,8 @@ void ExpectBoneSkins(const VSkin& i_rSkin)
 		EXPECT_NEAR(rBone.m_Skin->m_Share, sums[i][3] / whole, 0.02) << rBone.m_Name;
 		// The drawn vertices are in the scale of the bones, what is compared in that of the world.
 		const bool bOfWorldScale = std::abs(rBone.m_AccumulatedScale - 1.0f) < 0.01f;
+		if (bOfWorldScale)
+			ExpectCarried(rBone, lowest[i][0], lowest[i][1]);
 		for (std::size_t axis = 0; axis < 3 && bOfWorldScale && rBone.m_Skin->m_Share > 0.005; ++axis)
 			EXPECT_NEAR(rBone.m_Skin->m_Centre[axis], sums[i][axis] / sums[i][3], 0.25 * rBone.m_Skin->m_Spread + 1.0)
 			    << rBone.m_Name;

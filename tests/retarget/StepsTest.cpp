@@ -195,12 +195,21 @@ TEST_F(Steps, OfEveryKindInAnyOrderGiveTheBytesOfASave)
 				return;
 		}
 	}
+	// A saved subject is tied to no file until one is read.
+	m_Document.CreateTargetSubject();
+	m_Document.AddTargets({{0, 0, true, 1.0}});
+	m_Document.SaveTargetSubject(other);
+	m_Document.LoadTargetSubject(other);
+	Pose(1, 0, 0.1, 0);
+	m_Document.AlignToSource({}, 1);
+	m_Host.Dispatcher().RunPending();
+	ExpectTheSame();
 	EXPECT_GT(m_Commands, 10);
 	EXPECT_EQ(m_Kinds,
 	    (std::set<std::string>{"align", "allow-partial", "as-it-stands", "chain", "create-joints", "expressions",
-	        "fbx-pose", "feet", "lock", "match-file-pose", "pose", "position", "prune-joint", "prune-joints",
-	        "rebind-fbx", "rebind-source", "remove-target", "rotation", "scale", "source-name", "switch-root-height",
-	        "switch-source", "unlock", "update-targets", "weight"}));
+	        "fbx-pose", "feet", "lock", "match-file-pose", "on-joints", "pose", "position", "prune-joint",
+	        "prune-joints", "rebind-fbx", "rebind-source", "remove-target", "rotation", "scale", "skin", "source-name",
+	        "switch-root-height", "switch-source", "unlock", "update-targets", "weight"}));
 }
 
 } // namespace

@@ -158,9 +158,9 @@ TEST_F(Review, ChecksThePose)
 {
 	m_pOperator->ChooseInMenu("ToolsMenu", "CheckPose");
 	const QStringList told = Copied("PoseCheck").split('\n', Qt::SkipEmptyParts);
-	const QJsonArray findings =
-	    QJsonDocument::fromJson(Run({"map", File("hero.qrr"), "--source", File("performer.qrs"), "--json"}))["pose"]
-	        .toArray();
+	const QJsonArray findings = QJsonDocument::fromJson(Run(
+	    {"map", File("hero.qrr"), "--fbx", File("character.fbx"), "--source", File("performer.qrs"), "--json"}))["pose"]
+	                                .toArray();
 	ASSERT_EQ(told.size(), findings.size());
 	for (int i = 0; i < findings.size(); ++i)
 	{

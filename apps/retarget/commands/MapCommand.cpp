@@ -82,17 +82,17 @@ std::string ToText(const VMapped& i_rMapped)
 
 EExitStatus Map(const VMapSettings& i_rSettings)
 {
-	if (i_rSettings.m_Fbx.empty() == i_rSettings.m_Subject.empty())
-		throw VCommandError(EWrongUsage, "Give a character: either --fbx FILE or a retarget subject");
+	if (i_rSettings.m_Fbx.empty() && i_rSettings.m_Subject.empty())
+		throw VCommandError(EWrongUsage, "Give a character: --fbx FILE, a retarget subject, or both");
 	VSession session;
 	session.LoadSource(i_rSettings.m_Source);
+	if (!i_rSettings.m_Subject.empty())
+		session.LoadTarget(i_rSettings.m_Subject);
 	if (!i_rSettings.m_Fbx.empty())
 		session.LoadFbx(i_rSettings.m_Fbx);
-	else
-		session.LoadTarget(i_rSettings.m_Subject);
 	if (!i_rSettings.m_MinimumScore.empty())
 		session.m_MinimumScore = ParseScore(i_rSettings.m_MinimumScore);
-	const VMapped mapped = i_rSettings.m_Fbx.empty() ? ProposeForSubject(session) : ProposeForFile(session);
+	const VMapped mapped = i_rSettings.m_Subject.empty() ? ProposeForFile(session) : ProposeForSubject(session);
 	const auto findings = SetupProposal::CheckPose(mapped.m_Source, mapped.m_Target, mapped.m_Proposal);
 	VJson json = MappedToJson(mapped);
 	json["pose"] = PoseJson(findings);
@@ -113,7 +113,8 @@ VCommand AddMapCommand(CLI::App& io_rProgram)
 	    {"map --source performer.qrs --fbx hero.fbx", "map hero.qrr --source performer.qrs --min-score 0.7",
 	        "map --source performer.qrs --fbx hero.fbx --json | jq -r '.pairs[] | .source + \":\" + .target'"});
 	const auto pSettings = std::make_shared<VMapSettings>();
-	pApp->add_option("IN.qrr", pSettings->m_Subject, "A retarget subject, in place of an FBX file");
+	pApp->add_option("IN.qrr", pSettings->m_Subject,
+	    "A retarget subject, in place of an FBX file, or with its own for what it stands on");
 	pApp->add_option("--source", pSettings->m_Source, "The performer's skeleton")->option_text("FILE.qrs")->required();
 	pApp->add_option("--fbx", pSettings->m_Fbx, "The character's FBX file")->option_text("FILE");
 	pApp->add_option("--min-score", pSettings->m_MinimumScore,

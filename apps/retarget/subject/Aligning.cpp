@@ -121,6 +121,11 @@ void UnlockSegment(VSession& io_rSession, const std::string& i_rSegment)
 	io_rSession.m_Alignment.m_Locked.erase(FindElement(i_rSegment, SegmentsOf(io_rSession.Target(), "target segment")));
 }
 
+void StandOnJoints(VSession& io_rSession, const std::string&)
+{
+	io_rSession.m_Alignment.m_bOnJoints = true;
+}
+
 void AlignAsItStands(VSession& io_rSession, const std::string&)
 {
 	io_rSession.m_Alignment.m_bAsItStands = true;

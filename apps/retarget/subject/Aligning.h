@@ -23,6 +23,9 @@ void LockSegment(VSession& io_rSession, const std::string& i_rSegment);
 /// "--unlock": it no longer does.
 void UnlockSegment(VSession& io_rSession, const std::string& i_rSegment);
 
+/// "--on-joints".
+void StandOnJoints(VSession& io_rSession, const std::string&);
+
 /// "--as-it-stands": no pose of the FBX file comes before.
 void AlignAsItStands(VSession& io_rSession, const std::string&);
 

@@ -314,6 +314,11 @@ void FbxPose(VSession& io_rSession, const std::string& i_rPath)
 	io_rSession.MatchFilePose();
 }
 
+void StandOnSkin(VSession& io_rSession, const std::string& i_rPath)
+{
+	io_rSession.LoadFbx(i_rPath);
+}
+
 void SwitchSource(VSession& io_rSession, const std::string& i_rPath)
 {
 	io_rSession.LoadSource(i_rPath);
@@ -429,6 +434,12 @@ constexpr VEditKind c_Kinds[] = {
         ChooseFeet},
     {"--as-it-stands", nullptr, "From here on, --align begins with no other pose than the one that stands there",
         AlignAsItStands},
+    {"--skin", "FILE",
+        "From here on, --align lets the character stand on the skin of its FBX file FILE, which a saved retarget "
+        "subject has none of",
+        StandOnSkin, false, true},
+    {"--on-joints", nullptr, "From here on, --align lets the character stand on its joints, without a look at its skin",
+        StandOnJoints},
     {"--match-file-pose", nullptr,
         "Set all bind poses so that the segments stand as the bones do in the FBX file; belongs after --prune-joints",
         MatchFilePose, true},

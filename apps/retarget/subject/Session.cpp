@@ -127,6 +127,7 @@ void VSession::LoadFbx(const std::string& i_rPath)
 		throw VCommandError(EBadInput,
 		    "\"" + i_rPath + "\" could be read only in part: " + std::to_string(pSkeleton->size())
 		        + " bones up to where it broke off");
+	m_Alignment.m_bOnJoints = false;
 }
 
 void VSession::CreateTarget(const std::string& i_rPath, const std::optional<std::string>& i_rRoot, bool i_bBodyRoot,

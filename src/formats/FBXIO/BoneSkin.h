@@ -2,6 +2,10 @@
 
 #include "numerics/Rotation.h"
 
+#include <array>
+#include <memory>
+#include <vector>
+
 namespace FBXIO
 {
 
@@ -14,6 +18,10 @@ struct VBoneSkin
 	Rotation::VVector3 m_Centre{};
 	/// How far from there that is, as the root of the mean square, in mm.
 	double m_Spread = 0.0;
+	/// The points that it moves at least by half, along the same axes, in mm. Null if there are none.
+	std::shared_ptr<const std::vector<std::array<float, 3>>> m_pCarried = nullptr;
+	/// What was up when the skin was bound, along the same axes.
+	Rotation::VVector3 m_BoundUp{};
 };
 
 } // namespace FBXIO

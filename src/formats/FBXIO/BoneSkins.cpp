@@ -8,6 +8,11 @@ namespace FBXIO
 namespace
 {
 
+/// The share of a point's weights from which on a bone carries it.
+constexpr double c_Carries = 0.5;
+/// In mm: what is farther from its bone is damage.
+constexpr double c_Farthest = 1e9;
+
 /// A row of a matrix for row vectors: an axis, or the translation.
 Rotation::VVector3 Row(const FbxAMatrix& i_rMatrix, int i_Row)
 {
@@ -21,7 +26,16 @@ double Inner(const Rotation::VVector3& i_rA, const Rotation::VVector3& i_rB)
 
 } // namespace
 
-void VBoneSkinSums::Add(FbxCluster& i_rCluster, FbxMesh& io_rMesh)
+void AddWeights(FbxCluster& i_rCluster, std::vector<double>& io_rTotals)
+{
+	const int* const pPoints = i_rCluster.GetControlPointIndices();
+	const double* const pWeights = i_rCluster.GetControlPointWeights();
+	for (int i = 0, count = i_rCluster.GetControlPointIndicesCount(); i < count; ++i)
+		if (pPoints[i] >= 0 && std::size_t(pPoints[i]) < io_rTotals.size() && pWeights[i] > 0.0)
+			io_rTotals[std::size_t(pPoints[i])] += pWeights[i];
+}
+
+void VBoneSkinSums::Add(FbxCluster& i_rCluster, FbxMesh& io_rMesh, const std::vector<double>& i_rTotals, int i_UpAxis)
 {
 	FbxAMatrix place;
 	FbxAMatrix link;
@@ -41,12 +55,13 @@ void VBoneSkinSums::Add(FbxCluster& i_rCluster, FbxMesh& io_rMesh)
 		for (double& rValue : axes[axis])
 			rValue /= length;
 	}
+	for (std::size_t axis = 0; axis < 3; ++axis)
+		m_BoundUp[axis] = axes[axis][std::size_t(i_UpAxis)];
 	const int* const pPoints = i_rCluster.GetControlPointIndices();
 	const double* const pWeights = i_rCluster.GetControlPointWeights();
-	const int points = io_rMesh.GetControlPointsCount();
 	for (int i = 0, count = i_rCluster.GetControlPointIndicesCount(); i < count; ++i)
 	{
-		if (pPoints[i] < 0 || pPoints[i] >= points || !(pWeights[i] > 0.0))
+		if (pPoints[i] < 0 || std::size_t(pPoints[i]) >= i_rTotals.size() || !(pWeights[i] > 0.0))
 			continue;
 		const FbxVector4 point = io_rMesh.GetControlPointAt(pPoints[i]);
 		Rotation::VVector3 from;
@@ -58,8 +73,11 @@ void VBoneSkinSums::Add(FbxCluster& i_rCluster, FbxMesh& io_rMesh)
 			continue;
 		m_Weight += pWeights[i];
 		m_Squares += pWeights[i] * square;
-		for (int axis = 0; axis < 3; ++axis)
-			m_Places[axis] += pWeights[i] * Inner(from, axes[axis]);
+		const Rotation::VVector3 along{Inner(from, axes[0]), Inner(from, axes[1]), Inner(from, axes[2])};
+		for (std::size_t axis = 0; axis < 3; ++axis)
+			m_Places[axis] += pWeights[i] * along[axis];
+		if (pWeights[i] >= c_Carries * i_rTotals[std::size_t(pPoints[i])])
+			m_Carried.push_back(along);
 	}
 }
 
@@ -83,6 +101,14 @@ std::vector<VBoneSkin> BoneSkinsOf(const std::vector<VBoneSkinSums>& i_rSums, do
 		    * std::sqrt(std::max(0.0, rSums.m_Squares / rSums.m_Weight - Inner(rSkin.m_Centre, rSkin.m_Centre)));
 		for (double& rValue : rSkin.m_Centre)
 			rValue *= i_UnitScale;
+		rSkin.m_BoundUp = rSums.m_BoundUp;
+		std::vector<std::array<float, 3>> carried;
+		for (const Rotation::VVector3& rPlace : rSums.m_Carried)
+			if (i_UnitScale * std::sqrt(Inner(rPlace, rPlace)) < c_Farthest)
+				carried.push_back(
+				    {float(i_UnitScale * rPlace[0]), float(i_UnitScale * rPlace[1]), float(i_UnitScale * rPlace[2])});
+		if (!carried.empty())
+			rSkin.m_pCarried = std::make_shared<const std::vector<std::array<float, 3>>>(std::move(carried));
 	}
 	return skins;
 }

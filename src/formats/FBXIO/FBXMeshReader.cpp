@@ -344,17 +344,20 @@ void FBXIO::FBXMeshReader::FindUsedBones(FbxNode& i_rNode, std::set<std::int64_t
 }
 
 void FBXIO::FBXMeshReader::AddBoneSkins(
-    FbxNode& i_rNode, std::vector<VBoneSkinSums>& io_rSums, std::set<const FbxObject*>& io_rSeen) const
+    FbxNode& i_rNode, std::vector<VBoneSkinSums>& io_rSums, std::set<const FbxObject*>& io_rSeen, int i_UpAxis) const
 {
 	FbxSkin* const pSkin = FindSkin(i_rNode);
 	FbxMesh* const pMesh = pSkin && io_rSeen.insert(pSkin).second ? i_rNode.GetMesh() : nullptr;
-	if (pMesh)
-		ForEachCluster(*pSkin,
-		    [&](FbxCluster& i_rCluster)
-		    {
-			    if (const auto found = m_BoneOfName.find(i_rCluster.GetLink()->GetName()); found != m_BoneOfName.end())
-				    io_rSums[std::size_t(found->second)].Add(i_rCluster, *pMesh);
-		    });
+	if (!pMesh)
+		return;
+	std::vector<double> totals(std::size_t(std::max(0, pMesh->GetControlPointsCount())));
+	ForEachCluster(*pSkin, [&](FbxCluster& i_rCluster) { AddWeights(i_rCluster, totals); });
+	ForEachCluster(*pSkin,
+	    [&](FbxCluster& i_rCluster)
+	    {
+		    if (const auto found = m_BoneOfName.find(i_rCluster.GetLink()->GetName()); found != m_BoneOfName.end())
+			    io_rSums[std::size_t(found->second)].Add(i_rCluster, *pMesh, totals, i_UpAxis);
+	    });
 }
 
 std::shared_ptr<const VSkinSkeleton> FBXIO::FBXMeshReader::PruneSkeleton(std::set<std::int64_t> i_Bones)

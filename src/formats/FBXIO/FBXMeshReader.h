@@ -52,8 +52,9 @@ public:
 
 	/// Adds what the bones move of the node's mesh, one for each of the skeleton, unless its skin was seen before.
 	/// Tells nothing.
-	void AddBoneSkins(
-	    FbxNode& i_rNode, std::vector<VBoneSkinSums>& io_rSums, std::set<const FbxObject*>& io_rSeen) const;
+	/// @param i_UpAxis of the file, from 0 to 2.
+	void AddBoneSkins(FbxNode& i_rNode, std::vector<VBoneSkinSums>& io_rSums, std::set<const FbxObject*>& io_rSeen,
+	    int i_UpAxis) const;
 
 	/// Makes the skeleton of these bones and of all below them, and goes on with it.
 	std::shared_ptr<const VSkinSkeleton> PruneSkeleton(std::set<std::int64_t> i_Bones);

@@ -347,7 +347,8 @@ void FBXIO::FBXReader::ReadBoneSkins()
 	VSkinSkeleton& rBones = *m_pImpl->m_pSkeleton;
 	std::vector<VBoneSkinSums> sums(rBones.size());
 	std::set<const FbxObject*> seen;
-	m_pImpl->ForEachMesh([&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.AddBoneSkins(i_rNode, sums, seen); });
+	m_pImpl->ForEachMesh(
+	    [&](FbxNode& i_rNode) { m_pImpl->m_MeshReader.AddBoneSkins(i_rNode, sums, seen, m_pImpl->m_UpAxis); });
 	const std::vector<VBoneSkin> skins = BoneSkinsOf(sums, m_pImpl->m_UnitScale);
 	for (std::size_t i = 0; i < skins.size(); ++i)
 		rBones[i].m_Skin = skins[i];

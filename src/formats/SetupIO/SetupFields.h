@@ -69,6 +69,6 @@ inline constexpr VField<VChecks, std::optional<double>> c_CheckLimits[] = {
 inline constexpr const char* c_Pose = "pose";
 inline constexpr const char* c_PoseHelp = "What \"retarget map\" finds fine of the pose";
 /// What it looks at.
-inline constexpr const char* c_PoseIds[] = {"facing", "sides", "arms", "legs", "scale", "floor"};
+inline constexpr const char* c_PoseIds[] = {"facing", "sides", "arms", "legs", "scale", "floor", "soles"};
 
 } // namespace SetupIO::Fields

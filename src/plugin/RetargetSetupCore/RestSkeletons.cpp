@@ -19,10 +19,13 @@ std::optional<SetupProposal::VRestSkin> SkinAtRest(
 {
 	if (!i_rBone.m_Skin)
 		return std::nullopt;
-	SetupProposal::VRestSkin skin{i_rBone.m_Skin->m_Share, i_rPose.t, i_Scale * i_rBone.m_Skin->m_Spread};
-	for (std::size_t row = 0; row < 3; ++row)
-		for (std::size_t axis = 0; axis < 3; ++axis)
-			skin.m_Centre[row] += i_Scale * i_rPose.R[3 * row + axis] * i_rBone.m_Skin->m_Centre[axis];
+	SetupProposal::VRestSkin skin{i_rBone.m_Skin->m_Share, i_rPose.t, i_Scale * i_rBone.m_Skin->m_Spread,
+	    i_rBone.m_Skin->m_pCarried, i_rPose.R, Rotation::Product(i_rPose.R, i_rBone.m_Skin->m_BoundUp)};
+	for (double& rValue : skin.m_Axes)
+		rValue *= i_Scale;
+	const Rotation::VVector3 centre = Rotation::Product(skin.m_Axes, i_rBone.m_Skin->m_Centre);
+	for (std::size_t axis = 0; axis < 3; ++axis)
+		skin.m_Centre[axis] += centre[axis];
 	return skin;
 }
 

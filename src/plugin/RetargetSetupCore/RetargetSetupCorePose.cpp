@@ -117,6 +117,7 @@ std::optional<VRetargetSetupCore::VAlignedEdit> VRetargetSetupCore::Aligned(
 		return std::nullopt;
 	const VSubjectValues& source = both->m_Source;
 	VSubjectValues target = both->m_Target;
+	const FBXIO::VSkinSkeleton bones = i_rChoice.m_bOnJoints ? FBXIO::VSkinSkeleton() : BonesOfTarget();
 	RetargetSetup::VEdit edit = RetargetSetup::AlignmentEdit(i_rChoice, *target.m_pParametrised);
 	if (!i_rChoice.m_bAsItStands && AlignsFromFilePose())
 	{
@@ -130,11 +131,18 @@ std::optional<VRetargetSetupCore::VAlignedEdit> VRetargetSetupCore::Aligned(
 		edit.m_Commands.insert(edit.m_Commands.begin(),
 		    {RetargetSetup::c_FbxPoseCommand, UtilsFileSystem::ToUtf8(m_TargetFBXFile.m_Path), {}, 0});
 	}
-	else if (StandsAsMade())
-		edit.m_Commands.insert(edit.m_Commands.begin(), {RetargetSetup::c_AsItStandsCommand, {}, {}, 0});
+	else
+	{
+		if (StandsAsMade())
+			edit.m_Commands.insert(edit.m_Commands.begin(), {RetargetSetup::c_AsItStandsCommand, {}, {}, 0});
+		edit.m_Commands.insert(edit.m_Commands.begin(),
+		    bones.empty()
+		        ? SetupIO::VEdit{RetargetSetup::c_OnJointsCommand, {}, {}, 0}
+		        : SetupIO::VEdit{RetargetSetup::c_SkinCommand, UtilsFileSystem::ToUtf8(m_TargetFBXFile.m_Path), {}, 0});
+	}
 	std::string reason;
-	auto aligned = RetargetSetup::AlignToSource(
-	    *source.m_pParametrised, *source.m_pSubject, *target.m_pParametrised, *target.m_pSubject, i_rChoice, reason);
+	auto aligned = RetargetSetup::AlignToSource(*source.m_pParametrised, *source.m_pSubject, *target.m_pParametrised,
+	    *target.m_pSubject, bones, i_rChoice, reason);
 	if (!aligned)
 	{
 		CommandIgnored(c_Command, reason);

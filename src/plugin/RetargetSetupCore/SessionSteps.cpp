@@ -115,7 +115,8 @@ constexpr const char* c_SwitchSource = "switch-source";
 
 bool IsFileCommand(const std::string& i_rName)
 {
-	return i_rName == c_SwitchSource || i_rName == c_FbxPoseCommand || i_rName == c_RebindFbxCommand;
+	return i_rName == c_SwitchSource || i_rName == c_FbxPoseCommand || i_rName == c_RebindFbxCommand
+	    || i_rName == c_SkinCommand;
 }
 
 void TellIfChanged(const VReadFile& i_rFile, std::vector<std::string>& o_rChanged)
@@ -261,6 +262,11 @@ SetupIO::VSetup RecipeOf(const VSessionStep& i_rLast, std::vector<std::string>& 
 		else if (i_Edit.m_Name == c_FbxPoseCommand && std::exchange(fbx, *i_Edit.m_Value) == *i_Edit.m_Value
 		    && !recipe.m_Fbx.empty())
 			i_Edit = Command("match-file-pose");
+		// What is so already need not be said.
+		if (i_Edit.m_Name == c_SkinCommand && std::exchange(fbx, *i_Edit.m_Value) == *i_Edit.m_Value)
+			return;
+		if (i_Edit.m_Name == c_OnJointsCommand && std::exchange(fbx, {}).empty())
+			return;
 		recipe.m_Edits.push_back(std::move(i_Edit));
 	};
 	// The first is the source of the whole recipe.

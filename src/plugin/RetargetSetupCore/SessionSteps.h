@@ -79,6 +79,9 @@ std::optional<std::vector<SetupIO::VEdit>> EditsBetween(const VSubjectValues& i_
 inline constexpr const char* c_FbxPoseCommand = "fbx-pose";
 inline constexpr const char* c_RebindFbxCommand = "rebind-fbx";
 inline constexpr const char* c_AsItStandsCommand = "as-it-stands";
+/// Of an alignment: whether the character stands on the skin of a file, or on its joints.
+inline constexpr const char* c_SkinCommand = "skin";
+inline constexpr const char* c_OnJointsCommand = "on-joints";
 
 /// @param i_Scale that it was made with.
 /// @param i_bPoseFromFile whether it took the pose of the file at once.

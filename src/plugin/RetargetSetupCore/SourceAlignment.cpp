@@ -102,8 +102,8 @@ std::optional<SetupProposal::VPoseFinding> ScaleFinding(const VSubjectParametris
 }
 
 std::optional<VAligned> AlignToSource(const VSubjectParametrised& i_rSourceParametrised, const VSubject& i_rSource,
-    const VSubjectParametrised& i_rTargetParametrised, const VSubject& i_rTarget, const VAlignmentChoice& i_rChoice,
-    std::string& o_rReason)
+    const VSubjectParametrised& i_rTargetParametrised, const VSubject& i_rTarget, const FBXIO::VSkinSkeleton& i_rBones,
+    const VAlignmentChoice& i_rChoice, std::string& o_rReason)
 {
 	const auto pSourceFK = KinematicsInBindPose(i_rSourceParametrised, i_rSource, "source");
 	const auto pTargetFK = KinematicsInBindPose(i_rTargetParametrised, i_rTarget, "target");
@@ -122,7 +122,7 @@ std::optional<VAligned> AlignToSource(const VSubjectParametrised& i_rSourceParam
 	}
 	VAligned aligned{i_rTargetParametrised,
 	    SetupProposal::Align(
-	        RestOf(i_rSourceParametrised, i_rSource), RestOf(i_rTargetParametrised, i_rTarget), request)};
+	        RestOf(i_rSourceParametrised, i_rSource), RestOf(i_rTargetParametrised, i_rTarget, i_rBones), request)};
 	const SetupProposal::VAlignment& rAlignment = aligned.m_Alignment;
 	for (std::size_t i = 0; i < aligned.m_Subject.m_Segments.size(); ++i)
 	{

@@ -2,6 +2,7 @@
 
 #include "CoreOrlexTypes/Subject.h"
 #include "CoreOrlexTypes/SubjectParametrised.h"
+#include "FBXIO/SkinSkeleton.h"
 #include "SetupProposal/Alignment.h"
 #include "SetupProposal/PoseCheck.h"
 
@@ -25,6 +26,8 @@ struct VAlignmentChoice
 	bool m_bFeetWithShins = false;
 	/// The document begins with no other pose than the one that stands there.
 	bool m_bAsItStands = false;
+	/// The document lets the target stand on its joints, even if the skin of its file is known.
+	bool m_bOnJoints = false;
 	/// The document first scales the target, with the height of its root, so that its hips come to stand as high above
 	/// its feet as the source's. What differs by little stays.
 	bool m_bFitScale = false;
@@ -59,9 +62,11 @@ std::optional<SetupProposal::VPoseFinding> ScaleFinding(
 /// Brings each segment that a target ties to a source segment to where that points, see SetupProposal::Align. Only
 /// ball joints and the free joint of a root turn.
 /// @param i_rSource converted from i_rSourceParametrised, as i_rTarget is from i_rTargetParametrised.
+/// @param i_rBones that the target's segments were made of, for the skin that it stands on; empty if not known.
 /// @param o_rReason if nothing comes back: why, as a sentence for the operator.
 std::optional<VAligned> AlignToSource(const CoreOrlexTypes::VSubjectParametrised& i_rSourceParametrised,
     const CoreOrlexTypes::VSubject& i_rSource, const CoreOrlexTypes::VSubjectParametrised& i_rTargetParametrised,
-    const CoreOrlexTypes::VSubject& i_rTarget, const VAlignmentChoice& i_rChoice, std::string& o_rReason);
+    const CoreOrlexTypes::VSubject& i_rTarget, const FBXIO::VSkinSkeleton& i_rBones, const VAlignmentChoice& i_rChoice,
+    std::string& o_rReason);
 
 } // namespace RetargetSetup

@@ -117,9 +117,8 @@ bool VRetargetSetup::Advise()
 std::vector<SetupProposal::VPoseFinding> VRetargetSetup::PoseFindings(const SetupProposal::VProposal& i_rProposal) const
 {
 	const VSubjectValues source = SourceValues();
-	const VSubjectValues target = TargetValues();
-	return SetupProposal::CheckPose(RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject),
-	    RetargetSetup::RestOf(*target.m_pParametrised, *target.m_pSubject), i_rProposal);
+	return SetupProposal::CheckPose(
+	    RetargetSetup::RestOf(*source.m_pParametrised, *source.m_pSubject), TargetSkeleton(), i_rProposal);
 }
 
 QVariantMap VRetargetSetup::CheckPose()

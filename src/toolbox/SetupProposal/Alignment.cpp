@@ -2,6 +2,7 @@
 
 #include "SetupProposal/BodyParts.h"
 #include "SetupProposal/PoseCheck.h"
+#include "SetupProposal/Sole.h"
 #include "math/NumberText.h"
 
 #include <algorithm>
@@ -159,6 +160,8 @@ struct VPosed
 	/// The largest turn of a joint against what it hangs on, for each chain, and whose.
 	double m_Farthest[EChains] = {};
 	std::size_t m_FarthestJoint[EChains] = {};
+	/// For each joint, whether it is a foot that was held as when its skin was bound.
+	std::vector<bool> m_bLevelled;
 };
 
 class VAligner
@@ -175,6 +178,8 @@ public:
 		for (const VMember& rMember : m_Members)
 			AddAim(rMember);
 		m_Turn = Facing();
+		for (std::size_t i = 0; i < m_Target.size(); ++i)
+			m_Levels.push_back(IsPart(i, EFoot) || IsPart(i, EToe) ? LevelAsBound(m_Target[i]) : std::nullopt);
 	}
 
 	VAlignment Run()
@@ -215,6 +220,17 @@ private:
 		m_MemberOf[i_rPair.m_Target] = std::int64_t(m_Members.size());
 		m_Members.push_back({i_rPair.m_Source, i_rPair.m_Target, part, side, ChainOf(part, side)});
 	}
+
+	bool IsPart(std::size_t i_Joint, EBodyPart i_Part) const
+	{
+		return m_MemberOf[i_Joint] < 0 ? m_TargetBody.m_Joints[i_Joint].m_Part == i_Part
+		                               : m_Members[std::size_t(m_MemberOf[i_Joint])].m_Part == i_Part;
+	}
+
+	/// What holds a foot against the vertical as its skin was bound, from where it stands.
+	VMatrix3 Level(std::size_t i_Joint) const { return m_Levels[i_Joint].value_or(Rotation::c_Identity3); }
+
+	bool IsLevelled(std::size_t i_Joint) const { return Level(i_Joint) != Rotation::c_Identity3; }
 
 	bool IsBelow(std::size_t i_Joint, std::size_t i_Above) const
 	{
@@ -352,11 +368,12 @@ private:
 		return places;
 	}
 
-	/// Whether a foot keeps its tilt and turns about the vertical alone.
+	/// Whether a foot keeps its tilt, or gets the one of its skin, and turns about the vertical alone.
+	/// @param i_rNow with the tilt that it keeps or gets.
 	bool KeepsTilt(const VAim& i_rAim, const VVector3& i_rNow, const VVector3& i_rWished) const
 	{
 		return i_rAim.m_Member.m_Part == EFoot && IsFlat(i_rNow) && IsFlat(i_rWished)
-		    && std::abs(SlopeOf(i_rNow) - SlopeOf(i_rWished)) <= c_BuiltSlope;
+		    && (IsLevelled(i_rAim.m_Member.m_Target) || std::abs(SlopeOf(i_rNow) - SlopeOf(i_rWished)) <= c_BuiltSlope);
 	}
 
 	VPosed Pose(const VChains& i_rChains) const
@@ -378,6 +395,12 @@ private:
 			const VMember* const pMember = m_MemberOf[i] < 0 ? nullptr : &m_Members[std::size_t(m_MemberOf[i])];
 			if (pMember && i_rChains.contains(pMember->m_Chain) && !m_rRequest.m_Held.contains(i))
 				turn = TurnOf(i, *pMember, i_rChains, body, turn, posed);
+			if (const std::int64_t parent = m_Target[i].m_Parent; parent >= 0 && posed.m_bLevelled[std::size_t(parent)]
+			    && IsPart(i, EToe) && m_Levels[i] && !m_rRequest.m_Held.contains(i))
+				turn = Rotation::Product(posed.m_Turns[std::size_t(parent)],
+				    Rotation::Product(Rotation::Transposed(Level(std::size_t(parent))), *m_Levels[i]));
+			posed.m_bLevelled.push_back(pMember && pMember->m_Part == EFoot && i_rChains.contains(pMember->m_Chain)
+			    && !m_rRequest.m_Held.contains(i) && IsLevelled(i));
 			posed.m_Turns.push_back(turn);
 		}
 		return posed;
@@ -387,13 +410,16 @@ private:
 	    const VMatrix3& i_rCarried, VPosed& io_rPosed) const
 	{
 		if (m_AimOf[i_Joint] < 0)
-			return i_rMember.m_Part == EHead || i_rMember.m_Part == EFoot ? i_rBody : i_rCarried;
+			return i_rMember.m_Part == EFoot ? Rotation::Product(i_rBody, Level(i_Joint))
+			    : i_rMember.m_Part == EHead  ? i_rBody
+			                                 : i_rCarried;
 		const VAim& rAim = m_Aims[std::size_t(m_AimOf[i_Joint])];
 		const VVector3 wished = Wished(rAim, i_rChains);
 		const VVector3 atRest = Pointing(rAim, PlacesAtRest());
-		if (const VVector3 now = Rotation::Product(i_rBody, atRest); KeepsTilt(rAim, now, wished))
+		const VMatrix3 level = Rotation::Product(i_rBody, Level(i_Joint));
+		if (const VVector3 now = Rotation::Product(level, atRest); KeepsTilt(rAim, now, wished))
 			return WithShin(
-			    i_Joint, wished, Rotation::Product(AboutVertical(HeadingFromTo(now, wished)), i_rBody), io_rPosed);
+			    i_Joint, wished, Rotation::Product(AboutVertical(HeadingFromTo(now, wished)), level), io_rPosed);
 		const VVector3 carried = Rotation::Product(i_rCarried, atRest);
 		if (const double angle = AngleFromTo(carried, wished); angle > io_rPosed.m_Farthest[i_rMember.m_Chain])
 		{
@@ -403,7 +429,8 @@ private:
 		return Rotation::Product(Swing(carried, wished), i_rCarried);
 	}
 
-	/// A foot that leans as its shin does, about the way that it points, if that is asked for.
+	/// A foot that leans as its shin does, about the way that it points, if that is asked for. One that is held as when
+	/// its skin was bound is level under an upright shin.
 	VMatrix3 WithShin(std::size_t i_Foot, const VVector3& i_rWay, const VMatrix3& i_rTurn, const VPosed& i_rPosed) const
 	{
 		std::int64_t shin = m_Target[i_Foot].m_Parent;
@@ -417,7 +444,7 @@ private:
 		{ return std::atan2((i_rShin[1] * ahead[0] - i_rShin[0] * ahead[1]) / length, -i_rShin[2]); };
 		const VVector3 atRest = FromTo(m_Target[std::size_t(shin)].m_Place, m_Target[i_Foot].m_Place);
 		const double angle = lean(FromTo(i_rPosed.m_Places[std::size_t(shin)], i_rPosed.m_Places[i_Foot]))
-		    - lean(Rotation::Product(i_rTurn, atRest));
+		    - (IsLevelled(i_Foot) ? 0.0 : lean(Rotation::Product(i_rTurn, atRest)));
 		for (double& rValue : ahead)
 			rValue *= angle / length;
 		return Rotation::Product(Rotation::RotationMatrixFromAngleAxis(ahead), i_rTurn);
@@ -429,7 +456,8 @@ private:
 		const VVector3 before = Pointing(i_rAim, PlacesAtRest());
 		const VVector3 after = Pointing(i_rAim, i_rPosed.m_Places);
 		VAlignedJoint row{i_rAim.m_Member.m_Source, i_rAim.m_Member.m_Target, 0.0, 0.0, ""};
-		const bool bFoot = KeepsTilt(i_rAim, Rotation::Product(TurnOfBody(i_rChains), before), wished);
+		const bool bFoot = KeepsTilt(
+		    i_rAim, Rotation::Product(TurnOfBody(i_rChains), Rotation::Product(Level(row.m_Target), before)), wished);
 		row.m_Before = bFoot ? AngleFromTo(Horizontal(before), Horizontal(wished)) : AngleFromTo(before, wished);
 		row.m_After = bFoot ? AngleFromTo(Horizontal(after), Horizontal(wished)) : AngleFromTo(after, wished);
 		const auto held = m_rRequest.m_Held.find(row.m_Target);
@@ -439,6 +467,7 @@ private:
 			row.m_Note = "stays: it " + held->second;
 		else if (bFoot)
 			row.m_Note = m_rRequest.m_bFeetWithShins ? "seen from above: the foot leans as the shin does"
+			    : IsLevelled(row.m_Target)           ? "seen from above: the sole is level, as its skin was bound"
 			                                         : "seen from above: the foot keeps its tilt";
 		else if (i_rAim.m_Member.m_Part == EPelvis)
 			row.m_Note = "by the line through the hips";
@@ -510,14 +539,11 @@ private:
 	{
 		if (!m_rRequest.m_bLegs || m_rRequest.m_Held.contains(0))
 			return 0.0;
-		VRestSkeleton posed = m_Target;
-		for (std::size_t i = 0; i < posed.size(); ++i)
-			posed[i].m_Place = i_rPosed.m_Places[i];
-		const auto before = LowestOfFeet(m_Target, m_TargetBody);
-		const auto after = LowestOfFeet(posed, m_TargetBody);
-		return before && after
-		    ? m_Target[*before].m_Place[2] + LiftToFloor(m_Target, m_TargetBody) - posed[*after].m_Place[2]
-		    : 0.0;
+		const auto before = StandOf(m_Target, m_TargetBody);
+		const auto after = StandOf(Posed(m_Target, i_rPosed.m_Turns, i_rPosed.m_Places), m_TargetBody);
+		if (!before || !after)
+			return 0.0;
+		return (after->m_bSkin ? 0.0 : before->m_Height + LiftToFloor(m_Target, m_TargetBody)) - after->m_Height;
 	}
 
 	const VRestSkeleton m_Source;
@@ -530,6 +556,8 @@ private:
 	/// For each joint of the target, -1 for none.
 	std::vector<std::int64_t> m_MemberOf;
 	std::vector<std::int64_t> m_AimOf;
+	/// For each joint of the target, as LevelAsBound gives it, nothing for all but feet and toes.
+	std::vector<std::optional<VMatrix3>> m_Levels;
 	double m_Turn = 0.0;
 };
 

@@ -65,16 +65,17 @@ struct VAlignment
 	std::vector<VRefusedChain> m_Refused;
 	/// Of the whole about the vertical, to the left as seen from above.
 	double m_TurnDegrees = 0.0;
-	/// Of the root: along the floor, so that the feet stand where the source's do, and up, so that they stand as high
-	/// as they did or, if that was not the floor, on the floor.
+	/// Of the root: along the floor, so that the feet stand where the source's do, and up, so that the skin of the feet
+	/// touches the floor. Where no skin is known, they stand as high as they did or, if that was not the floor, on it.
 	Rotation::VVector3 m_MoveMm{};
 };
 
 /// Turns each joint of a chain by the smallest angle that lets it point where the source's points, from the root on:
 /// what it is turned about its own length stays. Clavicles and what is no part of a chain keep their pose against their
 /// parent; so does a pelvis, whose hips are brought level with the source's. Head and feet keep their tilt in the
-/// world, a foot turns about the vertical: their slopes are of the build, not of the pose. Where the source's soles
-/// lean outwards with splayed shins, which no joint's place tells, feet go with the shins on request.
+/// world, a foot turns about the vertical: their slopes are of the build, not of the pose. A foot whose sole was more
+/// level when its skin was bound is held as it was then, and so are its toes: the pose is a stride. Where the source's
+/// soles lean outwards with splayed shins, which no joint's place tells, feet go with the shins on request.
 ///
 /// The whole is moved to where the source's feet stand. Offsets of targets turn with their segments: a foot whose ankle
 /// stands 50 mm behind the source's would be lifted by 25 mm with each heel.

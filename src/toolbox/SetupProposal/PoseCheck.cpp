@@ -1,9 +1,12 @@
 #include "SetupProposal/PoseCheck.h"
 
+#include "SetupProposal/Sole.h"
 #include "math/NumberText.h"
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
+#include <map>
 #include <numbers>
 #include <optional>
 #include <string_view>
@@ -21,11 +24,28 @@ constexpr double c_FineScale = 0.02;
 constexpr double c_FineToeAbove = 0.11;
 constexpr double c_FineAnkleAbove = 0.15;
 constexpr double c_FineBelow = 0.02;
+/// Where the skin of the feet ends over or below it.
+constexpr double c_FineSkin = 0.01;
+/// What soles may lean in degrees, each by itself or one against the other.
+constexpr double c_FineSole = 5.0;
 
 /// Tenths of a millimetre of a leg.
 constexpr int c_ScaleDigits = 4;
 
 constexpr double c_Degrees = 180.0 / std::numbers::pi;
+
+/// The lowest joint of the feet; nothing without feet.
+std::optional<std::size_t> LowestOfFeet(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody)
+{
+	std::optional<std::size_t> lowest;
+	for (std::size_t i = 0; i < i_rSkeleton.size(); ++i)
+	{
+		const EBodyPart part = i_rBody.m_Joints[i].m_Part;
+		if ((part == EFoot || part == EToe) && (!lowest || i_rSkeleton[i].m_Place[2] < i_rSkeleton[*lowest].m_Place[2]))
+			lowest = i;
+	}
+	return lowest;
+}
 
 struct VBody
 {
@@ -150,16 +170,44 @@ VPoseFinding Scale(double i_Source, double i_Target)
 	return finding;
 }
 
-VPoseFinding Floor(const VBody& i_rTarget, std::size_t i_Lowest)
+VPoseFinding Floor(const VBody& i_rTarget, const VStand& i_rStand)
 {
-	const VRestJoint& rLowest = i_rTarget.m_rSkeleton[i_Lowest];
-	const double height = rLowest.m_Place[2];
 	const double lift = LiftToFloor(i_rTarget.m_rSkeleton, i_rTarget.m_rReading);
-	VPoseFinding finding{"floor", lift == 0.0, "", {{"lowestMm", height}}, ""};
-	finding.m_Message = "The lowest joint of the character's feet, \"" + rLowest.m_Name + "\", stands "
-	    + Rounded(std::abs(height), 0.1) + " mm " + (height < 0.0 ? "below" : "above") + " the floor";
+	VPoseFinding finding{"floor", lift == 0.0, "", {{"lowestMm", i_rStand.m_Height}}, ""};
+	const std::string height = Rounded(std::abs(i_rStand.m_Height), 0.1);
+	finding.m_Message = (i_rStand.m_bSkin ? "The lowest point of the skin of the character's feet, at \""
+	                                      : "The lowest joint of the character's feet, \"")
+	    + i_rTarget.m_rSkeleton[i_rStand.m_Joint].m_Name + "\", stands "
+	    + (height == "0" ? "on" : height + " mm " + (i_rStand.m_Height < 0.0 ? "below" : "above")) + " the floor";
 	if (!finding.m_bFine)
 		finding.m_Options = "--lift " + Rounded(lift, 0.1) + " --update-targets";
+	return finding;
+}
+
+/// How far the foot of a side is from where it was held when its skin was bound, if its sole was more level then.
+std::optional<double> Lean(const VBody& i_rTarget, ESide i_Side)
+{
+	const auto foot = i_rTarget.Joint(EFoot, i_Side);
+	const auto level = foot ? LevelAsBound(i_rTarget.m_rSkeleton[*foot]) : std::nullopt;
+	return level ? std::optional(c_Degrees * std::acos(std::clamp((*level)[8], -1.0, 1.0))) : std::nullopt;
+}
+
+std::optional<VPoseFinding> Soles(const VBody& i_rTarget)
+{
+	const auto left = Lean(i_rTarget, ESide::Left);
+	const auto right = Lean(i_rTarget, ESide::Right);
+	if (!left || !right)
+		return std::nullopt;
+	VPoseFinding finding{"soles", std::max(*left, *right) <= c_FineSole,
+	    "Both feet are held as level as when their skin was bound", {{"leftDegrees", *left}, {"rightDegrees", *right}},
+	    ""};
+	if (finding.m_bFine)
+		return finding;
+	finding.m_Message =
+	    "The character does not stand on its soles: from how it was held when its skin was bound, the left "
+	    "foot leans by "
+	    + Rounded(*left, 1.0) + " degrees, and the right by " + Rounded(*right, 1.0);
+	finding.m_Options = "--chain legs --align";
 	return finding;
 }
 
@@ -199,7 +247,9 @@ std::vector<VPoseFinding> CheckPose(
 	if (sourceHips && targetHips)
 		findings.push_back(Scale(*sourceHips, *targetHips));
 	if (targetHips)
-		findings.push_back(Floor(target, *LowestOfFeet(i_rTarget, i_rProposal.m_Target)));
+		findings.push_back(Floor(target, *StandOf(i_rTarget, i_rProposal.m_Target)));
+	if (auto soles = Soles(target))
+		findings.push_back(std::move(*soles));
 	return findings;
 }
 
@@ -217,16 +267,34 @@ double SuggestedScale(const VPoseFinding& i_rFinding)
 	return 1.0;
 }
 
-std::optional<std::size_t> LowestOfFeet(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody)
+std::optional<VStand> StandOf(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody)
 {
-	std::optional<std::size_t> lowest;
+	const auto lowest = LowestOfFeet(i_rSkeleton, i_rBody);
+	if (!lowest)
+		return std::nullopt;
+	/// For each joint the one that its foot begins with, -1 for what is none.
+	std::vector<std::int64_t> feet(i_rSkeleton.size(), -1);
+	std::map<std::int64_t, std::optional<double>> heights;
+	VStand onSkin{0, std::numeric_limits<double>::max(), true};
 	for (std::size_t i = 0; i < i_rSkeleton.size(); ++i)
 	{
-		const EBodyPart part = i_rBody.m_Joints[i].m_Part;
-		if ((part == EFoot || part == EToe) && (!lowest || i_rSkeleton[i].m_Place[2] < i_rSkeleton[*lowest].m_Place[2]))
-			lowest = i;
+		const std::int64_t parent = i_rSkeleton[i].m_Parent;
+		if (parent >= 0 && feet[std::size_t(parent)] >= 0)
+			feet[i] = feet[std::size_t(parent)];
+		else if (const EBodyPart part = i_rBody.m_Joints[i].m_Part; part == EFoot || part == EToe)
+			feet[i] = std::int64_t(i);
+		else
+			continue;
+		auto& rHeight = heights[feet[i]];
+		const auto height = LowestPoint(i_rSkeleton[i]);
+		if (!height)
+			continue;
+		rHeight = rHeight ? std::min(*rHeight, *height) : *height;
+		if (*height < onSkin.m_Height)
+			onSkin = {i, *height, true};
 	}
-	return lowest;
+	const bool bSkin = std::ranges::all_of(heights, [](const auto& i_rFoot) { return i_rFoot.second.has_value(); });
+	return bSkin ? onSkin : VStand{*lowest, i_rSkeleton[*lowest].m_Place[2], false};
 }
 
 double LiftToFloor(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody)
@@ -234,10 +302,12 @@ double LiftToFloor(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody
 	const auto hips = VBody{i_rSkeleton, i_rBody}.HipHeight();
 	if (!hips)
 		return 0.0;
-	const std::size_t lowest = *LowestOfFeet(i_rSkeleton, i_rBody);
-	const double height = i_rSkeleton[lowest].m_Place[2];
-	const double fineAbove = i_rBody.m_Joints[lowest].m_Part == EToe ? c_FineToeAbove : c_FineAnkleAbove;
-	return height <= fineAbove * *hips && height >= -c_FineBelow * *hips ? 0.0 : -height;
+	const VStand stand = *StandOf(i_rSkeleton, i_rBody);
+	const double fineAbove = stand.m_bSkin               ? c_FineSkin
+	    : i_rBody.m_Joints[stand.m_Joint].m_Part == EToe ? c_FineToeAbove
+	                                                     : c_FineAnkleAbove;
+	const double fineBelow = stand.m_bSkin ? c_FineSkin : c_FineBelow;
+	return stand.m_Height <= fineAbove * *hips && stand.m_Height >= -fineBelow * *hips ? 0.0 : -stand.m_Height;
 }
 
 } // namespace SetupProposal

@@ -21,4 +21,26 @@ VRestSkeleton Sound(VRestSkeleton i_Skeleton)
 	return i_Skeleton;
 }
 
+VRestSkeleton Posed(VRestSkeleton i_Skeleton, const std::vector<Rotation::VMatrix3>& i_rTurns,
+    const std::vector<Rotation::VVector3>& i_rPlaces)
+{
+	for (std::size_t i = 0; i < i_Skeleton.size(); ++i)
+	{
+		VRestJoint& rJoint = i_Skeleton[i];
+		if (rJoint.m_Skin)
+		{
+			VRestSkin& rSkin = *rJoint.m_Skin;
+			for (std::size_t axis = 0; axis < 3; ++axis)
+				rSkin.m_Centre[axis] -= rJoint.m_Place[axis];
+			rSkin.m_Centre = Rotation::Product(i_rTurns[i], rSkin.m_Centre);
+			for (std::size_t axis = 0; axis < 3; ++axis)
+				rSkin.m_Centre[axis] += i_rPlaces[i][axis];
+			rSkin.m_Axes = Rotation::Product(i_rTurns[i], rSkin.m_Axes);
+			rSkin.m_BoundUp = Rotation::Product(i_rTurns[i], rSkin.m_BoundUp);
+		}
+		rJoint.m_Place = i_rPlaces[i];
+	}
+	return i_Skeleton;
+}
+
 } // namespace SetupProposal
