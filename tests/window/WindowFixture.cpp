@@ -89,6 +89,13 @@ QStringList Window::Names(const char* i_pList) const
 	return names;
 }
 
+void Window::SelectPair(const char* i_pSource, const char* i_pTarget)
+{
+	m_pOperator->ClickRow("sourceSegments", RowOf("sourceSegments", i_pSource));
+	m_pOperator->ClickRow("targetSegments", RowOf("targetSegments", i_pTarget));
+	EXPECT_EVENTUALLY(m_pOperator->Property("addPositionTarget", "enabled").toBool());
+}
+
 int Window::RowOf(const char* i_pList, const char* i_pName) const
 {
 	const int row = Names(i_pList).indexOf(i_pName);

@@ -30,6 +30,8 @@ protected:
 	/// Of the rows of a list.
 	QStringList Names(const char* i_pList) const;
 	int RowOf(const char* i_pList, const char* i_pName) const;
+	/// In the lists of source and target.
+	void SelectPair(const char* i_pSource, const char* i_pTarget);
 	int Targets() const { return m_pOperator->Property("targets", "count").toInt(); }
 
 	QTemporaryDir m_Folder;
