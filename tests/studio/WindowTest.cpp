@@ -220,7 +220,9 @@ TEST_F(Window, TakesDroppedFilesByKind)
 TEST_F(Window, OpensFilesUsedLast)
 {
 	LoadPanel();
-	m_pWindow->Open(c_Source);
+	const QString source = Path("a & b.qrs");
+	QFile::copy(c_Source, source);
+	m_pWindow->Open(source);
 	m_pWindow->Open(c_Fbx);
 	RunEvents();
 	Restart();
@@ -228,8 +230,9 @@ TEST_F(Window, OpensFilesUsedLast)
 	QMenu& rMenu = *m_pWindow->findChild<QMenu*>("RecentMenu");
 	ASSERT_GE(rMenu.actions().size(), 2);
 	EXPECT_EQ(rMenu.actions()[0]->text(), "&1  " + c_Fbx);
+	EXPECT_TRUE(rMenu.actions()[1]->text().endsWith("a && b.qrs")) << "no mnemonic";
 	rMenu.actions()[1]->trigger();
-	EXPECT_EQ(RecentFiles(), (QStringList{c_Source, c_Fbx}));
+	EXPECT_EQ(RecentFiles(), (QStringList{source, c_Fbx}));
 	Action("ClearRecentFiles").trigger();
 	EXPECT_FALSE(rMenu.isEnabled());
 }

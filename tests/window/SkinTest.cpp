@@ -8,6 +8,7 @@
 #include "studio/host/Services.h"
 #include "studio/log/LogModel.h"
 
+#include <QDir>
 #include <QFile>
 #include <QPainter>
 
@@ -136,6 +137,17 @@ TEST_F(Skins, OfThreeCharactersFollowADrag)
 	}
 	painter.end();
 	EXPECT_TRUE(PictureTest::Matches(sheet, "characters"));
+}
+
+TEST_F(Skins, OfAFileFromElsewhereIsFoundBesideIt)
+{
+	QDir(m_Folder.path()).mkdir("elsewhere");
+	QFile::copy(File("character.fbx"), File("elsewhere/stranger.fbx"));
+	m_pOperator->Choose("SourceSkeleton", "performer");
+	m_pWindow->Open(File("elsewhere/stranger.fbx"));
+	EXPECT_EVENTUALLY(m_pOperator->Property("TargetRoot", "currentText").toString() == "haunch");
+	m_pOperator->Click("createTargetSubject");
+	EXPECT_EVENTUALLY(Wears("stranger"));
 }
 
 TEST_F(Skins, FollowTheirFileAndTellWhyTheyAreGone)

@@ -20,6 +20,7 @@ TesselPluginInterface::VHostRules VApplicationObject::Rules() const
 	rules.m_bMirrorChange = true;
 	rules.m_bWheelInFixedViews = true;
 	rules.m_bKeepsHistory = true;
+	rules.m_bSkinBesideFile = true;
 	return rules;
 }
 

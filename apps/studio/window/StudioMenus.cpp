@@ -45,6 +45,12 @@ namespace StudioHost
 namespace
 {
 
+/// For a menu, where a "&" in a name is no mnemonic.
+QString Verbatim(QString i_Text)
+{
+	return i_Text.replace('&', "&&");
+}
+
 struct VOpenRow
 {
 	EFileKind m_Kind;
@@ -212,7 +218,7 @@ void VStudioWindow::UpdateEditActions(bool i_bShown)
 	for (const auto& [pName, rText, rStep] : rows)
 	{
 		auto* const pAction = findChild<QAction*>(QLatin1String(pName));
-		pAction->setText(rStep.isEmpty() ? rText : QStringLiteral("%1 %2").arg(rText, rStep));
+		pAction->setText(rStep.isEmpty() ? rText : QStringLiteral("%1 %2").arg(rText, Verbatim(rStep)));
 		pAction->setEnabled(!i_bShown || !rStep.isEmpty());
 	}
 }
@@ -401,10 +407,8 @@ void VStudioWindow::UpdateRecentFiles()
 		++number;
 		const bool bTake = rFile.startsWith(QLatin1String(VRecentFiles::c_pAsTake));
 		const QString path = bTake ? rFile.mid(int(std::strlen(VRecentFiles::c_pAsTake))) : rFile;
-		// A "&" in a name is no mnemonic.
-		const QString text = QStringLiteral("&%1  %2%3")
-		                         .arg(number % 10)
-		                         .arg(QString(path).replace('&', "&&"), bTake ? tr(" (take)") : QString());
+		const QString text =
+		    QStringLiteral("&%1  %2%3").arg(number % 10).arg(Verbatim(path), bTake ? tr(" (take)") : QString());
 		AddAction(*m_pRecentMenu, "RecentFile", text, {},
 		    [this, rFile, path, bTake]
 		    {
@@ -466,8 +470,7 @@ void VStudioWindow::UpdateSaveActions()
 	{
 		auto* const pAction = findChild<QAction*>(QLatin1String(pName));
 		const QString note = why.isEmpty() ? rNote : why;
-		pAction->setText(
-		    note.isEmpty() ? rText : QStringLiteral("%1 (%2)").arg(rText, QString(note).replace('&', "&&")));
+		pAction->setText(note.isEmpty() ? rText : QStringLiteral("%1 (%2)").arg(rText, Verbatim(note)));
 		pAction->setEnabled(why.isEmpty());
 	}
 }

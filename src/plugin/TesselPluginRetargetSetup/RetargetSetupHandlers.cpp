@@ -153,6 +153,7 @@ void VRetargetSetupWidget::OnTargetFBXChanged()
 	}
 	RetargetSetup::VPanelParameters::OfferFile(*m_Parameters.m_pTargetFBX, path);
 	m_TargetFBXFile.Follow(QString::fromStdString(UtilsFileSystem::ToUtf8(path)));
+	LookForSkinsBeside(path);
 	if (!m_pRetargetSetup->LoadTargetFBX(path))
 	{
 		m_UnreadFBX = UtilsFileSystem::ToUtf8(path.filename());

@@ -26,6 +26,8 @@ namespace
 /// A step of the manipulator's size up, and the same step down.
 constexpr double c_ManipulatorScaleUp = 1.35;
 constexpr double c_ManipulatorScaleDown = 0.7407407;
+/// Each of them is watched.
+constexpr std::size_t c_MostOpenedFolders = 4;
 
 } // namespace
 
@@ -132,7 +134,24 @@ void VRetargetSetupWidget::UpdateSkinFolders()
 	const boost::filesystem::path user = m_pPreferenceFolders->Folder(c_FolderKeys[TesselPluginInterface::EPathSkins]);
 	if (!user.empty())
 		folders.push_back(user);
+	// Of several the last counts: what was chosen last.
+	for (const boost::filesystem::path& rFolder : m_OpenedFolders)
+	{
+		std::erase(folders, rFolder);
+		folders.push_back(rFolder);
+	}
 	m_pSkinCache->SetFolders(OrlexGraphics::c_pSubjectSkins, folders);
+}
+
+void VRetargetSetupWidget::LookForSkinsBeside(const boost::filesystem::path& i_rFile)
+{
+	if (!m_pRetargetSetup->HostRules().m_bSkinBesideFile)
+		return;
+	std::erase(m_OpenedFolders, i_rFile.parent_path());
+	m_OpenedFolders.push_back(i_rFile.parent_path());
+	if (m_OpenedFolders.size() > c_MostOpenedFolders)
+		m_OpenedFolders.erase(m_OpenedFolders.begin());
+	UpdateSkinFolders();
 }
 
 void VRetargetSetupWidget::UpdateRetargetsFolder()

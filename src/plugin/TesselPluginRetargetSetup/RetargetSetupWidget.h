@@ -83,6 +83,8 @@ private:
 	/// What was stored when the panel was last open.
 	void ApplyStoredValues();
 	void UpdateSkinFolders();
+	/// As the host wants it.
+	void LookForSkinsBeside(const boost::filesystem::path& i_rFile);
 	void UpdateRetargetsFolder();
 
 	void OnSourceSkeletonChanged();
@@ -150,5 +152,7 @@ private:
 	QString m_Remarks;
 	std::optional<VChosenSource> m_ChosenSource;
 	std::optional<VLoadedSource> m_LoadedSource;
+	/// Of FBX files that were chosen by path, the last behind.
+	std::vector<boost::filesystem::path> m_OpenedFolders;
 	RetargetSetup::VFollowedFile m_TargetFBXFile{[this] { OnTargetFBXWritten(); }};
 };

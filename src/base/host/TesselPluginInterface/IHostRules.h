@@ -30,6 +30,8 @@ struct VHostRules
 	bool m_bKeepsHistory = false;
 	/// The wheel of the mouse goes nearer and farther in the fixed views of the preview, too.
 	bool m_bWheelInFixedViews = false;
+	/// The skin of an FBX file that is opened from elsewhere is looked for in its own folder, too.
+	bool m_bSkinBesideFile = false;
 };
 
 /// What a host may give beyond the services that every host gives: the application object of such a host implements
