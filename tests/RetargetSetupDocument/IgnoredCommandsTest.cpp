@@ -176,6 +176,38 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	}
 }
 
+/// Of a preset that is damaged the line and what is wrong is told.
+TEST_F(CommandIgnored, ByPresetsThatCannotBeRead)
+{
+	SetSmallSubjects();
+	const std::pair<std::string, std::string> rows[] = {{"{\n\"pairs\": 1}", "2: \"pairs\" is to be "},
+	    {"{\"pairs\": [\n1]}", "2: this is to be a pair: "},
+	    {"{\"pairs\": [{\"source\": -1}]}", "1: \"source\" is to be a text in quotes"},
+	    {"{\"pairs\": [{\"source\": \"a\"}]}", "1: a pair has no \"target\", which names one of the two"},
+	    {"{\"pairs\": [{\"target\": \"a\"}]}", "1: a pair has no \"source\", which names one of the two"},
+	    {"{\"pairs\": [{\"position\": -1}]}", "1: \"position\" cannot be -1: it is 0 or more"},
+	    {"{\"pairs\": [{\"position\": -0.5}]}", "1: \"position\" cannot be -0.5: it is 0 or more"},
+	    {"{\"pairs\": [{\"position\": null}]}", "1: \"position\" is to be a number"},
+	    {"{\"pairs\": [{\"position\": 1e999}]}", "1: a number is larger than any that can be held"},
+	    {"{\"pairs\": [], \"pairs\": []}", "1: \"pairs\" stands there twice, first in line 1"},
+	    {"{\"pairs\": [", "1: this is no JSON: "}};
+	for (const auto& [text, reason] : rows)
+	{
+		Put(m_Folder / "a.json", text);
+		EXPECT_TRUE(m_Document.FitPreset(Url("a.json"), 0.5).isEmpty());
+		const std::string told = "FitPreset: '" + File("a.json") + "', line " + reason;
+		EXPECT_EQ(Take().substr(0, told.size()), told) << text;
+	}
+	Put(m_Folder / "a.json",
+	    R"({"pairs": [{"source": "Hips", "target": "pelvis", "comment": "the root"}, {"source": "x", "target": "y"}]})");
+	const QVariantMap fit = m_Document.FitPreset(Url("a.json"), 0.5);
+	ASSERT_EQ(fit["pairs"].toList().size(), 1);
+	EXPECT_EQ(fit["pairs"].toList()[0].toMap()["reasons"].toString(), "by names in the preset; the root");
+	EXPECT_EQ(fit["misfits"].toStringList(),
+	    QStringList{"\"x\" and \"y\": the source has no segment \"x\", and the target has no segment \"y\""});
+	EXPECT_EQ(fit["unmapped"].toList().size(), 4);
+}
+
 TEST_F(CommandIgnored, NotByCommandsThatDoTheirWork)
 {
 	SetSmallSubjects();

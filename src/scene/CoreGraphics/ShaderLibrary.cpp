@@ -26,6 +26,7 @@ template <typename TMap>
 std::vector<std::string> Names(const TMap& i_rMap)
 {
 	std::vector<std::string> names;
+	names.reserve(i_rMap.size());
 	for (const auto& [rName, rValue] : i_rMap)
 		names.push_back(rName);
 	return names;

@@ -26,6 +26,7 @@ std::vector<VRenderFBXScene::VMesh> VRenderFBXScene::ReadMeshes(FBXIO::FBXReader
 	io_rReader.ReadPlacedMeshes(placed);
 	CoreGraphics::VMaterialMeshMaker maker;
 	std::vector<VMesh> meshes;
+	meshes.reserve(placed.size());
 	for (const FBXIO::VPlacedMesh& rMesh : placed)
 		meshes.push_back({maker.Make(rMesh.m_Mesh), CoreGraphics::ToQt(rMesh.m_Transform)});
 	return meshes;
