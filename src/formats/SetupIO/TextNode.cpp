@@ -38,12 +38,6 @@ public:
 		m_pProgress->m_Line += m_pProgress->m_Last == '\n';
 		return *this;
 	}
-	VCounting operator++(int)
-	{
-		VCounting before = *this;
-		++*this;
-		return before;
-	}
 	bool operator==(const VCounting& i_rOther) const { return m_pAt == i_rOther.m_pAt; }
 	bool operator!=(const VCounting& i_rOther) const { return m_pAt != i_rOther.m_pAt; }
 
