@@ -61,7 +61,4 @@ std::unique_ptr<const VPlayedTake> PlayTake(VSession& io_rSession, const VTakeTo
 /// Writes the character's motion as WriteMotionFile does, at the size of the session's subject.
 void WriteSolvedMotion(const VSession& i_rSession, const VPlayedTake& i_rPlayed, VMotionOutput i_Output);
 
-/// Writes the character's motion as WriteMotionFile does, at the size of the session's subject.
-void WriteSolvedMotion(const VSession& i_rSession, const VPlayedTake& i_rPlayed, VMotionOutput i_Output);
-
 } // namespace CommandLine
