@@ -16,6 +16,8 @@ using Rotation::VVector3;
 
 /// Fewer points stand on nothing.
 constexpr std::size_t c_FewestPoints = 4;
+/// Of more, so many tell how a sole lies as well.
+constexpr std::size_t c_MostPoints = 4000;
 /// A sole that leans by fewer degrees more than when it was bound is as level.
 constexpr double c_AsLevel = 3.0;
 /// A plane is looked for that rises by no more than this to each side, to within so little.
@@ -75,13 +77,15 @@ double TiltOfLowerFace(const std::vector<VVector3>& i_rPoints)
 	return c_InDegrees * std::atan(std::hypot(x, bestY(x)));
 }
 
-/// From where it stands, along the axes of the world.
-std::vector<VVector3> PointsOf(const VRestSkin& i_rSkin)
+/// From where it stands, along the axes of the world: each, or one of so many.
+std::vector<VVector3> PointsOf(const VRestSkin& i_rSkin, std::size_t i_Step = 1)
 {
 	std::vector<VVector3> points;
-	points.reserve(i_rSkin.m_pCarried->size());
-	for (const auto& rCarried : *i_rSkin.m_pCarried)
+	for (std::size_t i = 0; i < i_rSkin.m_pCarried->size(); i += i_Step)
+	{
+		const auto& rCarried = (*i_rSkin.m_pCarried)[i];
 		points.push_back(Rotation::Product(i_rSkin.m_Axes, VVector3{rCarried[0], rCarried[1], rCarried[2]}));
+	}
 	return points;
 }
 
@@ -112,7 +116,7 @@ std::optional<VMatrix3> LevelAsBound(const VRestJoint& i_rJoint)
 	if (!i_rJoint.m_Skin || !i_rJoint.m_Skin->m_pCarried || i_rJoint.m_Skin->m_pCarried->size() < c_FewestPoints)
 		return std::nullopt;
 	const VMatrix3 turn = TurnUp(i_rJoint.m_Skin->m_BoundUp);
-	std::vector<VVector3> points = PointsOf(*i_rJoint.m_Skin);
+	std::vector<VVector3> points = PointsOf(*i_rJoint.m_Skin, i_rJoint.m_Skin->m_pCarried->size() / c_MostPoints + 1);
 	const double tilt = TiltOfLowerFace(points);
 	for (VVector3& rPoint : points)
 		rPoint = Rotation::Product(turn, rPoint);
