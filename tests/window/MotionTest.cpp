@@ -16,6 +16,7 @@
 #include "studio/motion/TimeLine.h"
 #include "studio/panel/RetargetPanel.h"
 
+#include <QAction>
 #include <QCheckBox>
 #include <QFile>
 #include <QJsonArray>
@@ -233,6 +234,39 @@ TEST_F(Motion, IsPlayedJudgedAndLeavesTheDocument)
 	EXPECT_NE(m_pOperator->See(middle, 150), moved);
 	m_pOperator->ClickAt({m_pOperator->Property("scene", "width").toDouble() - 3.0, 3.0});
 	EXPECT_EVENTUALLY(selection() != selected);
+}
+
+TEST_F(Motion, TheViewGoesAlongWithWhatIsSelected)
+{
+	m_pWindow->OpenTake(File("sway.bvh"));
+	EXPECT_EVENTUALLY(Player().Take() && Player().AtRest());
+	const auto& rFollow = *m_pWindow->findChild<QAction*>("FollowSelected");
+	const QPoint corner(60, m_pOperator->Property("scene", "height").toInt() - 60);
+	const auto floorAt = [&](std::size_t i_Frame)
+	{
+		Player().Seek(std::int64_t(i_Frame));
+		EXPECT_EVENTUALLY(Player().AtRest());
+		m_pOperator->WaitForDrawing();
+		m_pOperator->WaitForDrawing();
+		return m_pOperator->See(corner, 45);
+	};
+	const auto press = [this] { m_pOperator->Key(Qt::Key_L, Qt::ControlModifier); };
+	m_pWindow->Context().GetSelectionManager()->Selection().Replace({});
+	press();
+	EXPECT_FALSE(rFollow.isChecked()) << "nothing is selected";
+	EXPECT_EQ(floorAt(0), floorAt(15));
+
+	m_pOperator->ClickRow("targetSegments", RowOf("targetSegments", "skull"));
+	press();
+	ASSERT_TRUE(rFollow.isChecked());
+	m_pOperator->WaitForDrawing();
+	m_pWindow->Context().GetSelectionManager()->Selection().Replace({});
+	const QImage first = floorAt(0);
+	const QImage swayed = floorAt(15);
+	EXPECT_NE(swayed, first) << "what was selected then moves, and the view with it";
+	press();
+	EXPECT_FALSE(rFollow.isChecked());
+	EXPECT_EQ(floorAt(0), swayed) << "it stays where it is";
 }
 
 TEST_F(Motion, WhatCannotBeReadLeavesTheTakeBefore)

@@ -2,6 +2,7 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "NVX/IQuickWidget.h"
+#include "OrlexGraphics/item/Tracking.h"
 #include "TesselDataStore/StoredValue.h"
 #include "TesselPluginInterface/IParameter.h"
 #include "TesselPluginInterface/IParameterGroup.h"
@@ -84,6 +85,13 @@ VRetargetPanel::VRetargetPanel(
 	if (auto* const pQuickWidget = qobject_cast<QQuickWidget*>(m_pWidget.data()))
 		connect(pQuickWidget, &QQuickWidget::statusChanged, this, &VRetargetPanel::FollowRootItem);
 	FollowRootItem();
+}
+
+void VRetargetPanel::FollowSelected(bool i_bFollow)
+{
+	if (QQuickItem* const pView = Item("scene"))
+		pView->setProperty("tracking",
+		    QVariant::fromValue(i_bFollow ? OrlexGraphics::ETrackingSelectionThen : OrlexGraphics::ETrackingNone));
 }
 
 bool VRetargetPanel::ViewHasKeyboard() const

@@ -136,6 +136,9 @@ public:
 
 	QWidget* Widget() const { return m_pWidget; }
 
+	/// The middle of the preview goes along with what is selected now, as a take plays; or it stays.
+	void FollowSelected(bool i_bFollow);
+
 	/// Keys go to the preview.
 	bool ViewHasKeyboard() const;
 

@@ -2,6 +2,7 @@
 
 #include "DebugServices/GlobalLog.h"
 #include "TesselPluginInterface/IPreferenceFolders.h"
+#include "TesselPluginInterface/ISelectionManager.h"
 #include "TesselPluginInterface/PathTypes.h"
 #include "UtilsFileSystem/Paths.h"
 #include "studio/host/Preferences.h"
@@ -235,6 +236,9 @@ void VStudioWindow::MakeViewMenu(bool i_bDeveloper)
 		    [this, pCommand = rRow.m_pCommand] { Execute(QLatin1String(pCommand)); })
 		    ->setShortcuts(shortcuts);
 	}
+	m_pFollow = AddAction(rMenu, "FollowSelected", tr("F&ollow Selected"), QKeySequence(QStringLiteral("Ctrl+L")),
+	    [this] { FollowSelected(); });
+	m_pFollow->setCheckable(true);
 	rMenu.addSeparator();
 	m_pPanelMenu = Named(rMenu.addMenu(tr("&Panels")), "PanelMenu", tr("Panels"));
 	m_pPanelMenu->addAction(m_pLogDock->toggleViewAction());
@@ -425,6 +429,18 @@ void VStudioWindow::UpdateRecentFiles()
 	AddAction(*m_pRecentMenu, "ClearRecentFiles", tr("&Clear"), {}, [this] { m_pRecentFiles->Clear(); });
 }
 
+void VStudioWindow::FollowSelected()
+{
+	if (m_pFollow->isChecked() && m_pContext->GetSelectionManager()->Selection().Items().empty())
+	{
+		m_pFollow->setChecked(false);
+		NVX_LOG("Command", NVX::ELogWarning,
+		    "Follow Selected: Nothing is selected: select a segment first, as the hips of the character.");
+	}
+	if (m_pRetargetPanel)
+		m_pRetargetPanel->FollowSelected(m_pFollow->isChecked());
+}
+
 void VStudioWindow::ShowMouseAndKeys()
 {
 	const bool bAltSelects = m_pContext->Preferences().Number(TesselPluginInterface::c_NavigationAltKey, 1) != 0;
@@ -434,6 +450,7 @@ void VStudioWindow::ShowMouseAndKeys()
 	    {with(!bAltSelects, tr("left and right or middle button, dragged")), tr("moves the view")},
 	    {with(!bAltSelects, tr("right button, dragged; or the wheel")), tr("goes nearer and farther")},
 	    {tr("Ctrl+F"), tr("brings what is selected into the middle, or all where nothing is")},
+	    {tr("Ctrl+L"), tr("lets the view go along with what is selected as a take plays, and ends it")},
 	    {tr("click"), tr("selects what is under the mouse, and nothing else")},
 	    {tr("Shift and click"), tr("adds it to what is selected")},
 	    {tr("right button, clicked"), tr("opens a menu for what is under the mouse")},

@@ -121,6 +121,7 @@ private:
 	/// Of the present state, with the take that plays.
 	void WriteReport();
 	/// What they do in the preview, as the preferences have it.
+	void FollowSelected();
 	void ShowMouseAndKeys();
 	void ShowOperatorPage();
 	void ShowAbout();
@@ -156,6 +157,7 @@ private:
 	std::unique_ptr<VWorkKeeper> m_pWorkKeeper;
 	QMenu* m_pRecentMenu = nullptr;
 	QMenu* m_pPanelMenu = nullptr;
+	QAction* m_pFollow = nullptr;
 	/// What stands in the window where there is no panel.
 	QLabel* m_pNotice = nullptr;
 	QDockWidget* m_pLogDock = nullptr;

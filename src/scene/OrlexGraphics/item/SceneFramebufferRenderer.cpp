@@ -2,6 +2,7 @@
 
 #include "OrlexGraphics/frame/OrlexScene.h"
 #include "OrlexGraphics/item/SceneFramebufferObject.h"
+#include "OrlexGraphics/picking/SelectionRegistry.h"
 #include "TesselPluginInterface/ISelectionManager.h"
 
 #include <QOpenGLFramebufferObject>
@@ -85,6 +86,9 @@ void VSceneFramebufferRenderer::Track(VSceneFramebufferObject& io_rItem)
 {
 	CoreGraphics::VCameraController& rCamera = *io_rItem.m_pCamera;
 	const VOrlexScene* const pScene = m_Renderer.Scene().get();
+	// As it was drawn.
+	if (m_Tracking == ETrackingSelectionThen)
+		rCamera.m_Centre = m_Renderer.m_Input.m_Camera.m_Centre;
 	if (m_Tracking != io_rItem.m_Tracking
 	    && (m_Tracking == ETrackingTransform || io_rItem.m_Tracking == ETrackingTransform))
 		rCamera.Reset(m_Tracking != ETrackingTransform);
@@ -167,11 +171,27 @@ QOpenGLFramebufferObject* VSceneFramebufferRenderer::createFramebufferObject(con
 	return new QOpenGLFramebufferObject(i_rSize, m_Renderer.TargetFormat());
 }
 
+/// What is tracked stands elsewhere in the frame that was just taken, and the exchange only knew the one before it.
+void VSceneFramebufferRenderer::FollowTracked()
+{
+	const VOrlexScene* const pScene = m_Renderer.Scene().get();
+	if (m_Tracking != ETrackingSelectionThen || !pScene)
+		return;
+	m_TrackedBounds.clear();
+	for (const NVX::ISelectionItem& rItem : m_Tracked)
+		if (const QVector4D* const pBound = pScene->Registry().GetItemBound(rItem))
+			m_TrackedBounds.push_back(*pBound);
+	CoreGraphics::VCameraController& rCamera = m_Renderer.m_Input.m_Camera;
+	rCamera.Fit(m_TrackedBounds, false);
+	rCamera.Update();
+}
+
 void VSceneFramebufferRenderer::render()
 {
 	if (!m_bVisible)
 		return;
 	m_Renderer.Update();
+	FollowTracked();
 	if (m_bPickActive)
 	{
 		if (!m_Pick)

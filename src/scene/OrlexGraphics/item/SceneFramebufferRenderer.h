@@ -5,6 +5,7 @@
 #include "OrlexGraphics/picking/Picking.h"
 
 #include <QQuickFramebufferObject>
+#include <QVector4D>
 
 #include <cstdint>
 #include <optional>
@@ -39,6 +40,7 @@ private:
 	void TakeScene(VSceneFramebufferObject& io_rItem);
 	static void Fit(const VOrlexScene& i_rScene, EFit i_Fit, CoreGraphics::VCameraController& io_rCamera);
 	void Track(VSceneFramebufferObject& io_rItem);
+	void FollowTracked();
 
 	VFrameRenderer m_Renderer;
 	QQuickWindow* m_pWindow = nullptr;
@@ -51,6 +53,7 @@ private:
 	bool m_bVisible = false;
 	ETracking m_Tracking = ETrackingNone;
 	std::vector<NVX::ISelectionItem> m_Tracked;
+	std::vector<QVector4D> m_TrackedBounds;
 };
 
 } // namespace OrlexGraphics
