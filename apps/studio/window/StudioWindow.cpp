@@ -19,6 +19,7 @@
 #include "studio/window/PreferencesDialog.h"
 #include "studio/window/SkinProgress.h"
 
+#include <QAction>
 #include <QCloseEvent>
 #include <QDialog>
 #include <QDir>
@@ -138,6 +139,8 @@ bool VStudioWindow::LoadModule(const QString& i_rPath)
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::fileUsed, m_pRecentFiles.get(), &VRecentFiles::Add);
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::saveFailed, this, &VStudioWindow::ShowSaveFailure);
 		connect(m_pRetargetPanel.get(), &VRetargetPanel::stateChanged, this, &VStudioWindow::UpdateTitle);
+		// A view that was made anew follows nothing.
+		connect(m_pRetargetPanel.get(), &VRetargetPanel::ready, m_pFollow, [this] { m_pFollow->setChecked(false); });
 		connect(
 		    m_pRetargetPanel.get(), &VRetargetPanel::rebindCalledFor, this,
 		    [this](bool i_bPerformer) { ShowRebind(i_bPerformer, false); }, Qt::QueuedConnection);
