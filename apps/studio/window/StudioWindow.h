@@ -120,8 +120,8 @@ private:
 	void ShowPoseCheck();
 	/// Of the present state, with the take that plays.
 	void WriteReport();
-	/// What they do in the preview, as the preferences have it.
 	void FollowSelected();
+	/// What they do in the preview, as the preferences have it.
 	void ShowMouseAndKeys();
 	void ShowOperatorPage();
 	void ShowAbout();
