@@ -39,7 +39,9 @@ std::size_t UtilsRapidXml::FindBrokenCharacter(std::string_view i_Text)
 	while (position < i_Text.size())
 	{
 		const std::size_t end = std::min(position + sizeof(VBlock), i_Text.size());
-		const auto isNotPlain = [](VBlock i_Bytes) { return i_Bytes < 0x20; };
+		// Indented text is plain, too.
+		const auto isNotPlain = [](VBlock i_Bytes)
+		{ return (i_Bytes < 0x20) & (i_Bytes != '\t') & (i_Bytes != '\n') & (i_Bytes != '\r'); };
 		if (end - position == sizeof(VBlock) && !BlockHas(i_Text.data() + position, isNotPlain))
 			position = end;
 		while (position < end)

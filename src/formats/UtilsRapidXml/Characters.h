@@ -30,6 +30,12 @@ bool BlockHas(const char* i_pBytes, TIs i_Is)
 	return (halves[0] | halves[1]) != 0;
 }
 
+/// One of 64 bits for a name, which is not empty. Names that differ nearly always differ in it.
+inline std::uint64_t NameBit(std::string_view i_Name)
+{
+	return std::uint64_t(1) << ((i_Name.size() * 7 + i_Name.back() * 3 + i_Name.front()) % 64);
+}
+
 /// @return the place of the first byte that is no well-formed UTF-8 (overlong forms and surrogates included) or begins
 /// a character that XML cannot hold, npos if there is none.
 std::size_t FindBrokenCharacter(std::string_view i_Text);

@@ -1,8 +1,8 @@
 #include "UtilsRapidXml/Document.h"
 
 #include "UtilsRapidXml/Characters.h"
+#include "UtilsRapidXml/Parser.h"
 #include "UtilsRapidXml/Printer.h"
-#include "UtilsRapidXml/TextCheck.h"
 
 #include <rapidxml/rapidxml.hpp>
 
@@ -33,7 +33,7 @@ struct VDocument::VContent
 
 	char m_Empty[1] = {0};
 	std::string m_Text;
-	rapidxml::xml_document<char> m_Document;
+	VXmlDocument m_Document;
 };
 
 VDocument::VDocument() : m_pContent(std::make_unique_for_overwrite<VContent>()) {}
@@ -43,21 +43,9 @@ VDocument::~VDocument() = default;
 bool VDocument::Parse(std::string i_Text, std::string& o_rError)
 {
 	m_pContent->m_Document.clear();
-	if (!CheckText(i_Text, o_rError))
-		return false;
 	m_pContent->m_Text = std::move(i_Text);
-	try
-	{
-		// Elements of these documents have no content but elements; all text is in attributes.
-		constexpr int c_Flags =
-		    rapidxml::parse_validate_closing_tags | rapidxml::parse_no_data_nodes | rapidxml::parse_no_element_values;
-		m_pContent->m_Document.parse<c_Flags>(m_pContent->m_Text.data());
+	if (ParseText(m_pContent->m_Text, m_pContent->m_Document, o_rError))
 		return true;
-	}
-	catch (const rapidxml::parse_error& rError)
-	{
-		o_rError = rError.what();
-	}
 	m_pContent->m_Document.clear();
 	return false;
 }

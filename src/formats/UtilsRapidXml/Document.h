@@ -19,6 +19,7 @@ namespace UtilsRapidXml
 
 using VXmlNode = rapidxml::xml_node<char>;
 using VXmlAttribute = rapidxml::xml_attribute<char>;
+using VXmlDocument = rapidxml::xml_document<char>;
 
 /// An XML document in memory, with the text that its nodes point into: parsed from a text, or built and then printed.
 /// rapidxml stays behind it.

@@ -1,5 +1,7 @@
 #include "UtilsRapidXml/ReaderNode.h"
 
+#include "UtilsRapidXml/Characters.h"
+
 #include <rapidxml/rapidxml.hpp>
 
 #include <algorithm>
@@ -35,11 +37,6 @@ std::string Path(const VXmlNode* i_pElement)
 	return path;
 }
 
-std::uint64_t Bit(std::string_view i_Name)
-{
-	return std::uint64_t(1) << ((i_Name.size() * 7 + i_Name.back() * 3 + i_Name.front()) % 64);
-}
-
 /// Attributes of XML itself, which many programs write and no format declares.
 bool IsOfNamespaces(std::string_view i_Name)
 {
@@ -71,7 +68,7 @@ VReaderNode::VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pG
 		m_pGlobal->m_SpareNotes.pop_back();
 	}
 	for (const VXmlAttribute* pAttribute = m_pNextAttribute; pAttribute; pAttribute = pAttribute->next_attribute())
-		m_AttributeBits |= Bit(UtilsRapidXml::Name(pAttribute));
+		m_AttributeBits |= NameBit(UtilsRapidXml::Name(pAttribute));
 }
 
 VReaderNode::~VReaderNode()
@@ -209,7 +206,7 @@ bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string_view& o_
 		return i_pAttribute->name_size() == i_Name.size() && *i_pAttribute->name() == i_Name.front()
 		    && UtilsRapidXml::Name(i_pAttribute) == i_Name;
 	};
-	const bool bMaybe = (m_AttributeBits & Bit(i_Name)) != 0;
+	const bool bMaybe = (m_AttributeBits & NameBit(i_Name)) != 0;
 	const VXmlAttribute* pAttribute = bMaybe ? m_pNextAttribute : nullptr;
 	while (pAttribute && !is(pAttribute))
 		pAttribute = pAttribute->next_attribute();
