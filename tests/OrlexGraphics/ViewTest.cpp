@@ -2,8 +2,10 @@
 #include "OrlexGraphics/item/SceneFramebufferRenderer.h"
 #include "ViewFixture.h"
 
+#include <QGuiApplication>
 #include <QMetaProperty>
 #include <QQmlPropertyMap>
+#include <QScreen>
 #include <QSignalSpy>
 
 #include <cmath>
@@ -130,6 +132,34 @@ TEST_F(VViewTest, DrawsPassesInTheirOrder)
 	SetOption("3D", false);
 	ASSERT_TRUE(Until([&] { return Pixel(25, 25) == c_Background; }));
 	EXPECT_EQ(Pixel(25, 35), 0xff0000ff);
+}
+
+TEST_F(VViewTest, ShowsTheMeanOfEachPixelsSamples)
+{
+	// From the middle of a pixel of the display, and from three quarters down: two and one of four samples.
+	const double pixel = 1.0 / QGuiApplication::primaryScreen()->devicePixelRatio();
+	m_pScene->m_Next.m_Boxes = {{Item(1), {20 + 0.5 * pixel, 20 + 0.75 * pixel, 40, 40}, 0.0f, {1, 1, 1, 1}}};
+	Show();
+	ASSERT_TRUE(Until([&] { return Pixel(40, 40) == 0xffffffff; }));
+	const auto mean = [](double i_Share) { return 0x20 + i_Share * (0xff - 0x20); };
+	EXPECT_NEAR(qRed(Pixel(20, 40)), mean(0.5), 1.0);
+	EXPECT_NEAR(qRed(Pixel(40, 20)), mean(0.25), 1.0);
+	EXPECT_NEAR(qRed(Pixel(40, 60)), mean(0.75), 1.0);
+	EXPECT_EQ(Pixel(62, 62), c_Background);
+
+	// Over white, as the window is.
+	const auto over = [](int i_Channel, double i_Opacity) { return i_Opacity * i_Channel + (1 - i_Opacity) * 0xff; };
+	m_pView->setOpacity(0.25);
+	EXPECT_TRUE(Until([&] { return std::abs(qRed(Pixel(62, 62)) - over(0x20, 0.25)) <= 1.0; }));
+	m_pView->setOpacity(1.0);
+
+	// Views of cameras have one sample a pixel, once they are of another size.
+	SetOption("CameraView", true);
+	Resize(c_Width, c_Height - 20);
+	EXPECT_TRUE(Until([&] { return m_pView->height() < c_Height && Pixel(20, 40) == c_Background; }));
+	SetOption("CameraView", false);
+	Resize(c_Width, c_Height);
+	EXPECT_TRUE(Until([&] { return std::abs(qRed(Pixel(20, 40)) - mean(0.5)) <= 1.0; }));
 }
 
 TEST_F(VViewTest, OutlinesWhatIsSelectedAndWhatTheMousePointsAt)

@@ -92,6 +92,11 @@ void VFrameRenderer::BeginFrame()
 
 void VFrameRenderer::Render(QOpenGLFramebufferObject& io_rTarget)
 {
+	Render(io_rTarget.handle());
+}
+
+void VFrameRenderer::Render(unsigned int i_Target)
+{
 	BeginFrame();
 	m_Context.m_OutlineRectangle = OutlineRectangle();
 	if (!m_Context.m_OutlineRectangle.isEmpty())
@@ -101,7 +106,7 @@ void VFrameRenderer::Render(QOpenGLFramebufferObject& io_rTarget)
 		RenderScene();
 	}
 	m_Context.m_Mode = CoreGraphics::ERenderNormal;
-	m_Context.m_DefaultFramebuffer = io_rTarget.handle();
+	m_Context.m_DefaultFramebuffer = i_Target;
 	m_Context.BindDefaultFramebuffer();
 	m_Context.BindFramebufferTexture(c_SelectionUnit, *m_pIdFramebuffer);
 	RenderScene();

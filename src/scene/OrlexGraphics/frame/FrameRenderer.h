@@ -71,6 +71,8 @@ public:
 	/// @param o_rPick the request's frame becomes the one that was picked from.
 	void Pick(const VPickRequest& i_rRequest, VPick& o_rPick);
 	/// Draws the visible frame into a framebuffer of the size that was set.
+	/// @param i_Target OpenGL's name of it
+	void Render(unsigned int i_Target);
 	void Render(QOpenGLFramebufferObject& io_rTarget);
 	/// Draws 2D text and marks over it.
 	void Paint();

@@ -5,11 +5,14 @@
 #include "OrlexGraphics/frame/OrlexScene.h"
 #include "OrlexGraphics/item/CameraGrid.h"
 #include "OrlexGraphics/item/NoOpenGLNode.h"
+#include "OrlexGraphics/item/Samples.h"
 #include "OrlexGraphics/item/SceneFramebufferRenderer.h"
 #include "OrlexGraphics/item/SceneOptionsMap.h"
 #include "OrlexGraphics/manipulator/IManipulator.h"
 #include "OrlexGraphics/overlays/OverlayObjects.h"
 #include "OrlexGraphics/overlays/OverlayPlacement.h"
+
+#include <QSGNode>
 
 #include <algorithm>
 #include <cmath>
@@ -179,8 +182,12 @@ QQuickFramebufferObject::Renderer* VSceneFramebufferObject::createRenderer() con
 
 QSGNode* VSceneFramebufferObject::updatePaintNode(QSGNode* io_pNode, UpdatePaintNodeData* io_pData)
 {
-	return HasOpenGL(*window()) ? QQuickFramebufferObject::updatePaintNode(io_pNode, io_pData)
-	                            : UpdateNoOpenGLNode(io_pNode, *window(), size());
+	if (!HasOpenGL(*window()))
+		return UpdateNoOpenGLNode(io_pNode, *window(), size());
+	QSGNode* const pNode = QQuickFramebufferObject::updatePaintNode(io_pNode, io_pData);
+	if (pNode && m_pSamples)
+		ShowSamples(static_cast<QSGGeometryNode&>(*pNode), m_pSamples);
+	return pNode;
 }
 
 void VSceneFramebufferObject::OnFocusChanged()

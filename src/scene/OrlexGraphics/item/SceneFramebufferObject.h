@@ -25,6 +25,7 @@ class IManipulator;
 class VCameraGrid;
 class VCameraObject;
 class VOrlexScene;
+class VSamples;
 class VSubjectObject;
 struct VPick;
 struct VPickRequest;
@@ -197,6 +198,8 @@ private:
 	bool m_bTrackSelectionPending = false;
 	EFit m_Fit = EFit::None;
 	bool m_bWheelInFixedViews = false;
+	/// What the renderer draws into, null if that is not to be read.
+	std::shared_ptr<const VSamples> m_pSamples;
 	NVX::VConnection m_FrameConnection;
 	NVX::VConnection m_PublishedConnection;
 };

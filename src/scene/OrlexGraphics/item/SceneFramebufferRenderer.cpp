@@ -1,6 +1,7 @@
 #include "OrlexGraphics/item/SceneFramebufferRenderer.h"
 
 #include "OrlexGraphics/frame/OrlexScene.h"
+#include "OrlexGraphics/item/Samples.h"
 #include "OrlexGraphics/item/SceneFramebufferObject.h"
 #include "OrlexGraphics/picking/SelectionRegistry.h"
 #include "TesselPluginInterface/ISelectionManager.h"
@@ -50,6 +51,9 @@ void VSceneFramebufferRenderer::TakeScene(VSceneFramebufferObject& io_rItem)
 		m_Renderer.Initialise();
 		// The processor has better things to do than to draw again what has not changed.
 		m_bContinuousUpdate = io_rItem.m_bContinuousUpdate && !m_Renderer.IsSoftware();
+		if (VSamples::AreReadable())
+			m_pSamples = std::make_shared<VSamples>();
+		io_rItem.m_pSamples = m_pSamples;
 	}
 	std::shared_ptr<VOrlexScene> pScene = io_rItem.m_pScene ? io_rItem.m_pScene->weak_from_this().lock() : nullptr;
 	if (m_Renderer.Scene() != pScene)
@@ -101,6 +105,7 @@ void VSceneFramebufferRenderer::Track(VSceneFramebufferObject& io_rItem)
 		if (io_rItem.m_bTrackSelectionPending)
 			m_Tracked = rSelected;
 		QMatrix4x4 transform;
+		// From the frame that was drawn, so that labels go along where no other frame follows.
 		if (m_Tracking == ETrackingSelectionThen)
 			rCamera.Fit(pScene->GetBounds(m_Tracked), false);
 		else if (m_Tracking == ETrackingSelection)
@@ -168,7 +173,12 @@ void VSceneFramebufferRenderer::synchronize(QQuickFramebufferObject* io_pItem)
 QOpenGLFramebufferObject* VSceneFramebufferRenderer::createFramebufferObject(const QSize& i_rSize)
 {
 	m_Renderer.SetSize(i_rSize);
-	return new QOpenGLFramebufferObject(i_rSize, m_Renderer.TargetFormat());
+	const QOpenGLFramebufferObjectFormat format = m_Renderer.TargetFormat();
+	if (m_pSamples)
+		m_pSamples->Make(i_rSize, format);
+	// What is shown of samples does not go through it.
+	return m_pSamples && m_pSamples->AreThere() ? new QOpenGLFramebufferObject(i_rSize)
+	                                            : new QOpenGLFramebufferObject(i_rSize, format);
 }
 
 /// What is tracked stands elsewhere in the frame that was just taken, and the exchange only knew the one before it.
@@ -198,7 +208,7 @@ void VSceneFramebufferRenderer::render()
 			m_Pick.emplace();
 		m_Renderer.Pick(m_Request, *m_Pick);
 	}
-	m_Renderer.Render(*framebufferObject());
+	m_Renderer.Render(m_pSamples && m_pSamples->AreThere() ? m_pSamples->Framebuffer() : framebufferObject()->handle());
 	m_Renderer.Paint();
 	if (m_pWindow)
 		m_pWindow->resetOpenGLState();

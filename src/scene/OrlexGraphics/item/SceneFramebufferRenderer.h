@@ -8,6 +8,7 @@
 #include <QVector4D>
 
 #include <cstdint>
+#include <memory>
 #include <optional>
 #include <vector>
 
@@ -16,6 +17,7 @@ class QQuickWindow;
 namespace OrlexGraphics
 {
 
+class VSamples;
 class VSceneFramebufferObject;
 enum class EFit : std::uint32_t;
 
@@ -43,6 +45,8 @@ private:
 	void FollowTracked();
 
 	VFrameRenderer m_Renderer;
+	/// Null where they cannot be read.
+	std::shared_ptr<VSamples> m_pSamples;
 	QQuickWindow* m_pWindow = nullptr;
 	bool m_bPickActive = false;
 	/// What is to be picked.
