@@ -236,7 +236,7 @@ TEST(Document, SurvivesDamage)
 
 TEST(Characters, FindsTheFirstBrokenByteWhereverItStands)
 {
-	for (std::size_t size = 1; size < 40; ++size)
+	for (std::size_t size = 1; size < 150; size += 1 + size / 16)
 		for (std::size_t at = 0; at < size; ++at)
 		{
 			std::string text(size, '~');

@@ -47,7 +47,7 @@ std::function<void(INode&)> Note(VTexts& io_rVisited)
 	{
 		std::string_view text;
 		io_rNode.ProcessAttribute("n", text, "", "xsd:string", false);
-		io_rVisited.push_back(io_rNode.GetName() + std::string(text));
+		io_rVisited.push_back(std::string(io_rNode.GetName()).append(text));
 	};
 }
 

@@ -2,7 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <bit>
+#include <cctype>
 #include <clocale>
 #include <cmath>
 #include <cstdio>
@@ -52,6 +54,13 @@ void ExpectSameScan(const std::string& i_rText)
 		EXPECT_TRUE(std::isnan(value)) << '"' << i_rText << '"';
 	else
 		EXPECT_EQ(std::bit_cast<std::uint64_t>(value), std::bit_cast<std::uint64_t>(expected)) << '"' << i_rText << '"';
+	// A list goes on behind finite numbers that white space or the end follows.
+	const bool bOne = expectedRead > 0 && std::isfinite(expected)
+	    && (expectedRead == i_rText.size() || std::isspace(static_cast<unsigned char>(i_rText[expectedRead])));
+	std::string_view rest = i_rText;
+	EXPECT_EQ(::NumberText::ScanReals(rest, {&value, 1}), bOne) << '"' << i_rText << '"';
+	const std::size_t next = i_rText.find_first_not_of(" \t\n\v\f\r", bOne ? expectedRead : 0);
+	EXPECT_EQ(rest, i_rText.substr(std::min(next, i_rText.size()))) << '"' << i_rText << '"';
 }
 
 TEST_F(NumberText, ScansWhatTheLibraryScans)

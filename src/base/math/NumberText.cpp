@@ -174,6 +174,22 @@ void AppendRoundTripDigits(std::string& io_rText, double i_Value)
 		(io_rText += '.').append(digits + whole, count - whole);
 }
 
+/// Nearly every number is plain: digits that neither a mark of another base nor an exponent without digits follows.
+/// @return where such a number ends, null if none begins here.
+inline const char* ScanPlainReal(const char* i_pFrom, const char* i_pEnd, double& o_rValue)
+{
+	const char* const pDigits = i_pFrom != i_pEnd && *i_pFrom == '-' ? i_pFrom + 1 : i_pFrom;
+	if (pDigits == i_pEnd || !(IsDigit(*pDigits) || *pDigits == '.'))
+		return nullptr;
+	double value = 0.0;
+	const auto result = std::from_chars(i_pFrom, i_pEnd, value);
+	const char next = result.ptr == i_pEnd ? ' ' : char(*result.ptr | 0x20);
+	if (result.ec != std::errc() || next == 'x' || next == 'e')
+		return nullptr;
+	o_rValue = value;
+	return result.ptr;
+}
+
 } // namespace
 
 std::size_t NumberText::ScanReal(std::string_view i_Text, double& o_rValue)
@@ -181,19 +197,8 @@ std::size_t NumberText::ScanReal(std::string_view i_Text, double& o_rValue)
 	const char* const pBegin = i_Text.data();
 	const char* const pEnd = pBegin + i_Text.size();
 	const char* p = SkipDigits(pBegin, pEnd, IsSpace);
-	// Nearly every number is plain: digits that neither a mark of another base nor an exponent without digits follows.
-	const char* const pDigits = p != pEnd && *p == '-' ? p + 1 : p;
-	if (pDigits != pEnd && (IsDigit(*pDigits) || *pDigits == '.'))
-	{
-		double value = 0.0;
-		const auto result = std::from_chars(p, pEnd, value);
-		const char next = result.ptr == pEnd ? ' ' : char(*result.ptr | 0x20);
-		if (result.ec == std::errc() && next != 'x' && next != 'e')
-		{
-			o_rValue = value;
-			return result.ptr - pBegin;
-		}
-	}
+	if (const char* const pBehind = ScanPlainReal(p, pEnd, o_rValue))
+		return pBehind - pBegin;
 	bool bNegative = false;
 	if (p != pEnd && (*p == '+' || *p == '-'))
 		bNegative = *p++ == '-';
@@ -232,6 +237,26 @@ std::size_t NumberText::ScanReal(std::string_view i_Text, double& o_rValue)
 	}
 	o_rValue = bNegative ? -value : value;
 	return pNumberEnd - pBegin;
+}
+
+std::size_t NumberText::ScanReals(std::string_view& io_rText, std::span<double> o_Values)
+{
+	const char* const pEnd = io_rText.data() + io_rText.size();
+	const char* p = SkipDigits(io_rText.data(), pEnd, IsSpace);
+	std::size_t count = 0;
+	for (; p != pEnd && count < o_Values.size(); ++count)
+	{
+		double value = 0.0;
+		const char* pBehind = ScanPlainReal(p, pEnd, value);
+		if (!pBehind)
+			pBehind = p + ScanReal({p, pEnd}, value);
+		if (pBehind == p || (pBehind != pEnd && !IsSpace(*pBehind)) || !std::isfinite(value))
+			break;
+		o_Values[count] = value;
+		p = SkipDigits(pBehind, pEnd, IsSpace);
+	}
+	io_rText = {p, pEnd};
+	return count;
 }
 
 bool NumberText::ScanWholeReal(std::string_view i_Text, double& o_rValue)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <span>
 #include <string>
 #include <string_view>
 
@@ -13,6 +14,11 @@ namespace NumberText
 /// letter without digits fails the number; an overflow gives an infinity and an underflow the nearest value or zero.
 /// @return the number of bytes that were read, 0 if the text does not begin with a number; then o_rValue is untouched.
 std::size_t ScanReal(std::string_view i_Text, double& o_rValue);
+
+/// Reads finite numbers as ScanReal does, with white space around each, until one does not follow or there is no more
+/// room: lists of numbers are most of many files.
+/// @return how many there were; they are taken off the text's front, with the white space behind them.
+std::size_t ScanReals(std::string_view& io_rText, std::span<double> o_Values);
 
 /// True if ScanReal reads the whole text.
 bool ScanWholeReal(std::string_view i_Text, double& o_rValue);

@@ -9,6 +9,7 @@
 #include <charconv>
 #include <cmath>
 #include <limits>
+#include <span>
 
 namespace UtilsRapidXml
 {
@@ -22,7 +23,9 @@ bool IsSpace(char i_Byte)
 
 std::string_view AfterSpace(std::string_view i_Text)
 {
-	return {std::find_if_not(i_Text.begin(), i_Text.end(), IsSpace), i_Text.end()};
+	while (!i_Text.empty() && IsSpace(i_Text.front()))
+		i_Text.remove_prefix(1);
+	return i_Text;
 }
 
 /// Takes the next part off the text's front; empty at the end.
@@ -62,53 +65,40 @@ bool ReadSingle(INode& io_rNode, const VAttribute& i_rAttribute, T& o_rValue)
 	return false;
 }
 
-/// Takes the next real off the text's front, behind white space. The text is not cut first: lists of numbers are most
-/// of a file.
-bool TakeValue(std::string_view& io_rText, double& o_rValue)
-{
-	const std::size_t read = NumberText::ScanReal(io_rText, o_rValue);
-	if (read == 0 || (read < io_rText.size() && !IsSpace(io_rText[read])) || !std::isfinite(o_rValue))
-		return false;
-	io_rText.remove_prefix(read);
-	return true;
-}
-
-bool TakeValue(std::string_view& io_rText, std::int32_t& o_rValue)
+/// Takes an integer off the text's front, and the white space behind it.
+/// @return how many values were taken.
+std::size_t TakeInteger(std::string_view& io_rText, std::span<std::int32_t> o_Values)
 {
 	std::string_view rest = io_rText;
-	if (!ToValue(TakePart(rest), o_rValue))
-		return false;
-	io_rText = rest;
-	return true;
+	if (!ToValue(TakePart(rest), o_Values.front()))
+		return 0;
+	io_rText = AfterSpace(rest);
+	return 1;
 }
 
-constexpr auto TakeReal = [](std::string_view& io_rText, std::size_t, double& o_rValue)
-{ return TakeValue(io_rText, o_rValue); };
-
-/// @param i_rTake takes a value off the text's front, or returns false without taking anything.
+/// @param i_rTake takes values off the text's front, which is no white space, as many as it can and there is room for,
+/// and the white space behind them.
+/// @return false, with an error added, if the text is not one value for each place.
 template <typename T, typename TTake>
-bool ReadValues(
-    INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, T* o_pValues, const TTake& i_rTake)
+bool TakeValues(INode& io_rNode, const VAttribute& i_rAttribute, std::string_view i_Text, std::span<T> o_Values,
+    const TTake& i_rTake)
 {
-	std::string_view rest;
-	if (!ReadAttribute(io_rNode, i_rAttribute, rest))
-		return false;
 	bool bAllTaken = true;
 	std::size_t count = 0;
-	while (!(rest = AfterSpace(rest)).empty())
+	for (std::string_view rest = AfterSpace(i_Text); !rest.empty();)
 	{
-		if (count < i_Count && i_rTake(rest, count, o_pValues[count]))
-			++count;
-		else
-		{
-			TakePart(rest);
-			bAllTaken = false;
-			++count;
-		}
+		const std::size_t taken = count < o_Values.size() ? i_rTake(rest, o_Values.subspan(count)) : 0;
+		count += taken;
+		if (taken > 0)
+			continue;
+		TakePart(rest);
+		rest = AfterSpace(rest);
+		bAllTaken = false;
+		++count;
 	}
-	if (count == i_Count && bAllTaken)
+	if (count == o_Values.size() && bAllTaken)
 		return true;
-	if (count != i_Count)
+	if (count != o_Values.size())
 		AddIncorrectCount(io_rNode, i_rAttribute.m_Name);
 	else
 		AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
@@ -120,8 +110,11 @@ template <typename T, typename TTake>
 bool ReadInto(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, std::vector<T>& io_rTarget,
     std::size_t i_Offset, const TTake& i_rTake)
 {
+	std::string_view text;
+	if (!ReadAttribute(io_rNode, i_rAttribute, text))
+		return false;
 	std::vector<T> values(i_Count);
-	if (!ReadValues(io_rNode, i_rAttribute, i_Count, values.data(), i_rTake))
+	if (!TakeValues(io_rNode, i_rAttribute, text, std::span(values), i_rTake))
 		return false;
 	if (i_Offset == 0 && io_rTarget.size() <= i_Count)
 	{
@@ -248,20 +241,22 @@ bool ReadAttribute(INode& io_rNode, const VAttribute& i_rAttribute, VVersion& o_
 bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, std::vector<double>& io_rTarget,
     std::size_t i_Offset)
 {
-	return ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset, TakeReal);
+	return ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset, NumberText::ScanReals);
 }
 
 bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count,
     std::vector<std::int32_t>& io_rTarget, std::size_t i_Offset)
 {
-	return ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset,
-	    [](std::string_view& io_rText, std::size_t, std::int32_t& o_rValue) { return TakeValue(io_rText, o_rValue); });
+	return ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset, TakeInteger);
 }
 
 bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count, double* o_pTarget)
 {
+	std::string_view text;
+	if (!ReadAttribute(io_rNode, i_rAttribute, text))
+		return false;
 	boost::container::small_vector<double, 9> values(i_Count);
-	if (!ReadValues(io_rNode, i_rAttribute, i_Count, values.data(), TakeReal))
+	if (!TakeValues(io_rNode, i_rAttribute, text, std::span(values.data(), i_Count), NumberText::ScanReals))
 		return false;
 	std::copy(values.begin(), values.end(), o_pTarget);
 	return true;
@@ -270,20 +265,22 @@ bool ReadList(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Cou
 bool ReadListWithPlaceholders(INode& io_rNode, const VAttribute& i_rAttribute, std::size_t i_Count,
     std::vector<double>& io_rTarget, std::vector<bool>& o_rPlaceholders, std::size_t i_Offset)
 {
-	std::vector<bool> placeholders(i_Count);
-	const auto take = [&](std::string_view& io_rText, std::size_t i_Index, double& o_rValue)
+	std::vector<bool> placeholders;
+	const auto take = [&](std::string_view& io_rText, std::span<double> o_Values)
 	{
 		std::string_view rest = io_rText;
 		const std::string_view part = TakePart(rest);
 		if (part != "*" && part != "?")
-			return TakeValue(io_rText, o_rValue);
-		placeholders[i_Index] = true;
-		o_rValue = std::numeric_limits<double>::max();
-		io_rText = rest;
-		return true;
+			return NumberText::ScanReals(io_rText, o_Values);
+		placeholders.resize(i_Count);
+		placeholders[i_Count - o_Values.size()] = true;
+		o_Values.front() = std::numeric_limits<double>::max();
+		io_rText = AfterSpace(rest);
+		return std::size_t(1);
 	};
 	if (!ReadInto(io_rNode, i_rAttribute, i_Count, io_rTarget, i_Offset, take))
 		return false;
+	placeholders.resize(i_Count);
 	o_rPlaceholders = std::move(placeholders);
 	return true;
 }

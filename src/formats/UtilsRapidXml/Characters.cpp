@@ -35,14 +35,16 @@ std::size_t SequenceLength(std::string_view i_Text)
 
 std::size_t UtilsRapidXml::FindBrokenCharacter(std::string_view i_Text)
 {
+	// Indented text is plain, too.
+	const auto isNotPlain = [](VBlock i_Bytes)
+	{ return (i_Bytes < 0x20) & (i_Bytes != '\t') & (i_Bytes != '\n') & (i_Bytes != '\r'); };
+	constexpr std::size_t c_Blocks = 4;
+	constexpr std::size_t c_Step = c_Blocks * sizeof(VBlock);
 	std::size_t position = 0;
 	while (position < i_Text.size())
 	{
-		const std::size_t end = std::min(position + sizeof(VBlock), i_Text.size());
-		// Indented text is plain, too.
-		const auto isNotPlain = [](VBlock i_Bytes)
-		{ return (i_Bytes < 0x20) & (i_Bytes != '\t') & (i_Bytes != '\n') & (i_Bytes != '\r'); };
-		if (end - position == sizeof(VBlock) && !BlockHas(i_Text.data() + position, isNotPlain))
+		const std::size_t end = std::min(position + c_Step, i_Text.size());
+		if (end - position == c_Step && !BlockHas<c_Blocks>(i_Text.data() + position, isNotPlain))
 			position = end;
 		while (position < end)
 		{

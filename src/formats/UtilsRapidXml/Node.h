@@ -22,7 +22,7 @@ class INode
 public:
 	virtual ~INode() = default;
 
-	virtual const std::string& GetName() const = 0;
+	virtual std::string_view GetName() const = 0;
 
 	/// Records the file's version in the information that all nodes of the document share.
 	virtual void SetVersion(VVersion i_Version) = 0;

@@ -49,11 +49,15 @@ bool IsInName(char i_Byte, unsigned char i_Place)
 bool IsPlainValue(std::string_view i_Value)
 {
 	const auto isOther = [](const auto& i_rBytes) { return ((i_rBytes >= 0) & (i_rBytes < ' ')) | (i_rBytes == '&'); };
-	for (; i_Value.size() >= sizeof(VBlock); i_Value.remove_prefix(sizeof(VBlock)))
-		if (BlockHas(i_Value.data(), isOther))
+	if (i_Value.size() < sizeof(VBlock))
+		return std::none_of(
+		    i_Value.begin(), i_Value.end(), [&](char i_Byte) { return isOther(static_cast<signed char>(i_Byte)); });
+	// The last block may overlap the one before.
+	const char* const pLast = i_Value.data() + i_Value.size() - sizeof(VBlock);
+	for (const char* p = i_Value.data(); p < pLast; p += sizeof(VBlock))
+		if (BlockHas(p, isOther))
 			return false;
-	return std::none_of(
-	    i_Value.begin(), i_Value.end(), [&](char i_Byte) { return isOther(static_cast<signed char>(i_Byte)); });
+	return !BlockHas(pLast, isOther);
 }
 
 constexpr std::pair<std::string_view, char> c_Entities[] = {
@@ -73,6 +77,9 @@ char* AppendUtf8(std::uint32_t i_Code, char* o_p)
 		*o_p++ = static_cast<char>(0x80 | (i_Code >> 6 * i & 0x3F));
 	return o_p;
 }
+
+/// Attributes that are looked through for each further one of an element; of more all are sorted.
+constexpr std::size_t c_Few = 24;
 
 /// What an "&" stands for.
 struct VReference
@@ -139,6 +146,14 @@ private:
 		return true;
 	}
 
+	bool Take(char i_Byte)
+	{
+		if (*m_p != i_Byte)
+			return false;
+		++m_p;
+		return true;
+	}
+
 	std::string_view TakeName()
 	{
 		char* const pBegin = m_p;
@@ -171,7 +186,7 @@ private:
 	bool Opening();
 	bool Closing();
 	bool Attribute(VXmlNode& io_rElement);
-	bool AttributeTwice(const VXmlNode& i_rElement);
+	static std::string_view TwiceAmongMany(const VXmlNode& i_rElement);
 	bool Text();
 	bool References(const char* i_pBegin, const char* i_pEnd);
 	char* Decode(char* i_pBegin, const char* i_pEnd);
@@ -183,9 +198,10 @@ private:
 	/// The element in hand; the document where there is none.
 	VXmlNode* m_pOpen;
 	std::size_t m_Depth = 0;
-	/// The names of the attributes of the tag in hand, and whether two of them may be one.
+	/// The attributes of the tag in hand, their names, and that of one which stands twice.
+	std::size_t m_AttributeCount = 0;
 	std::uint64_t m_NameBits = 0;
-	bool m_bMaybeTwice = false;
+	std::string_view m_Twice;
 	/// Of text and nodes.
 	std::size_t m_Bytes = m_rText.size();
 	/// Line ends of the values behind us that are no longer in the text.
@@ -264,7 +280,7 @@ bool VParser::DocumentType()
 			return fail();
 		++m_p;
 	}
-	return Take(">") || fail();
+	return Take('>') || fail();
 }
 
 bool VParser::Opening()
@@ -277,18 +293,23 @@ bool VParser::Opening()
 	VXmlNode* const pElement = m_rDocument.allocate_node(rapidxml::node_element);
 	pElement->name(name.data(), name.size());
 	m_pOpen->append_node(pElement);
+	m_AttributeCount = 0;
 	m_NameBits = 0;
-	m_bMaybeTwice = false;
+	m_Twice = {};
 	SkipSpace();
 	while (m_p != m_pEnd && *m_p != '>' && *m_p != '/')
 		if (!Attribute(*pElement))
 			return false;
-	if (m_bMaybeTwice && AttributeTwice(*pElement))
-		return false;
-	if (Take("/>"))
-		return true;
-	if (!Take(">"))
+	if (m_AttributeCount > c_Few)
+		m_Twice = TwiceAmongMany(*pElement);
+	if (!m_Twice.empty())
+		return Fail(m_Twice.data(), "attribute " + std::string(m_Twice) + " stands twice");
+	const bool bEmpty = *m_p == '/' && m_p[1] == '>';
+	m_p += bEmpty;
+	if (!Take('>'))
 		return Fail(m_p, "tag of element " + std::string(name) + " does not end");
+	if (bEmpty)
+		return true;
 	m_pOpen = pElement;
 	return ++m_Depth <= c_MaximumDepth
 	    || Fail(m_p, "elements are nested deeper than " + std::to_string(c_MaximumDepth));
@@ -301,7 +322,7 @@ bool VParser::Closing()
 	SkipSpace();
 	if (m_Depth == 0 || name != std::string_view(m_pOpen->name(), m_pOpen->name_size()))
 		return Fail(pAt, "closing tag " + std::string(name) + " does not match");
-	if (!Take(">"))
+	if (!Take('>'))
 		return Fail(m_p, "closing tag " + std::string(name) + " does not end");
 	m_pOpen = m_pOpen->parent();
 	--m_Depth;
@@ -314,7 +335,7 @@ bool VParser::Attribute(VXmlNode& io_rElement)
 	if (name.empty())
 		return Fail(m_p, "attribute without a name");
 	SkipSpace();
-	if (!Take("="))
+	if (!Take('='))
 		return Fail(m_p, "attribute " + std::string(name) + " has no value");
 	SkipSpace();
 	const char quote = *m_p;
@@ -333,13 +354,15 @@ bool VParser::Attribute(VXmlNode& io_rElement)
 	m_p = pQuote + 1;
 	if (!Count(sizeof(VXmlAttribute)))
 		return false;
+	const std::uint64_t bit = NameBit(name);
+	if (++m_AttributeCount <= c_Few && (m_NameBits & bit) != 0 && m_Twice.empty()
+	    && io_rElement.first_attribute(name.data(), name.size()))
+		m_Twice = name;
+	m_NameBits |= bit;
 	VXmlAttribute* const pAttribute = m_rDocument.allocate_attribute();
 	pAttribute->name(name.data(), name.size());
 	pAttribute->value(pBegin, pEnd - pBegin);
 	io_rElement.append_attribute(pAttribute);
-	const std::uint64_t bit = NameBit(name);
-	m_bMaybeTwice = m_bMaybeTwice || (m_NameBits & bit) != 0;
-	m_NameBits |= bit;
 	SkipSpace();
 	return true;
 }
@@ -380,28 +403,15 @@ char* VParser::Decode(char* i_pBegin, const char* i_pEnd)
 	return pOut;
 }
 
-/// True, with the error set, if two attributes of the element have one name.
-bool VParser::AttributeTwice(const VXmlNode& i_rElement)
+/// A name that two attributes of the element have, empty if there is none.
+std::string_view VParser::TwiceAmongMany(const VXmlNode& i_rElement)
 {
 	std::vector<std::string_view> names;
 	for (const auto* pAttribute = i_rElement.first_attribute(); pAttribute; pAttribute = pAttribute->next_attribute())
 		names.emplace_back(pAttribute->name(), pAttribute->name_size());
-	constexpr std::size_t c_Few = 24;
-	std::string_view twice;
-	if (names.size() <= c_Few)
-	{
-		for (auto name = names.begin(); name != names.end() && twice.empty(); ++name)
-			if (std::find(names.begin(), name, *name) != name)
-				twice = *name;
-	}
-	else
-	{
-		std::sort(names.begin(), names.end());
-		const auto found = std::adjacent_find(names.begin(), names.end());
-		if (found != names.end())
-			twice = *found;
-	}
-	return !twice.empty() && !Fail(twice.data(), "attribute " + std::string(twice) + " stands twice");
+	std::sort(names.begin(), names.end());
+	const auto twice = std::adjacent_find(names.begin(), names.end());
+	return twice == names.end() ? std::string_view() : *twice;
 }
 
 std::string VParser::Error() const

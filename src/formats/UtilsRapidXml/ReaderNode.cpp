@@ -57,8 +57,7 @@ VReaderNode::VReaderNode(VDocument& i_rDocument, bool i_bStrictOrder)
 }
 
 VReaderNode::VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pGlobal)
-    : m_pElement(i_pElement), m_Name(UtilsRapidXml::Name(i_pElement)), m_pGlobal(std::move(i_pGlobal)),
-      m_pNextAttribute(i_pElement->first_attribute())
+    : m_pElement(i_pElement), m_pGlobal(std::move(i_pGlobal)), m_pNextAttribute(i_pElement->first_attribute())
 {
 	if (m_pGlobal->m_SpareNotes.empty())
 		m_pNotes = std::make_unique<VNotes>();
@@ -110,6 +109,11 @@ void VReaderNode::TellIgnored()
 			        [&] { return (Path(m_pElement) += '/') += UtilsRapidXml::Name(pAttribute); });
 }
 
+std::string_view VReaderNode::GetName() const
+{
+	return UtilsRapidXml::Name(m_pElement);
+}
+
 void VReaderNode::DeclareElement(std::string_view i_Name, std::string_view, std::uint32_t i_MinimumCount,
     std::uint32_t i_MaximumCount, VVersion i_Minimum, VVersion i_Maximum)
 {
@@ -125,9 +129,9 @@ void VReaderNode::Match(const VDeclaration& i_rDeclaration, bool i_bChoice, std:
 	bool bRecognised = Contains(m_pNotes->m_RecognisedChildren, i_rDeclaration.m_Name);
 	for (VXmlNode* pChild = m_pElement->first_node(); pChild; pChild = pChild->next_sibling(), ++position)
 	{
-		const std::string_view name = UtilsRapidXml::Name(pChild);
-		if (name != i_rDeclaration.m_Name)
+		if (!AreSameName(UtilsRapidXml::Name(pChild), i_rDeclaration.m_Name))
 			continue;
+		const std::string_view name = UtilsRapidXml::Name(pChild);
 		if (!bRecognised)
 			m_pNotes->m_RecognisedChildren.push_back(name);
 		bRecognised = true;
@@ -196,53 +200,49 @@ void VReaderNode::ProcessElements(const std::function<void(INode&)>& i_rCallback
 	}
 }
 
-bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string_view& o_rText, std::string_view,
-    std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum, VVersion i_Maximum)
+const VXmlAttribute* VReaderNode::FindAttribute(std::string_view i_Name)
 {
 	// Attributes nearly always stand in the order in which they are asked for: the search goes on where the last one
 	// was found.
-	const auto is = [&](const VXmlAttribute* i_pAttribute)
+	const VXmlAttribute* pAttribute = m_pNextAttribute;
+	if (!pAttribute || !AreSameName(UtilsRapidXml::Name(pAttribute), i_Name))
 	{
-		return i_pAttribute->name_size() == i_Name.size() && *i_pAttribute->name() == i_Name.front()
-		    && UtilsRapidXml::Name(i_pAttribute) == i_Name;
-	};
-	const bool bMaybe = (m_AttributeBits & NameBit(i_Name)) != 0;
-	const VXmlAttribute* pAttribute = bMaybe ? m_pNextAttribute : nullptr;
-	while (pAttribute && !is(pAttribute))
-		pAttribute = pAttribute->next_attribute();
-	if (!pAttribute && bMaybe)
-	{
+		if ((m_AttributeBits & NameBit(i_Name)) == 0)
+			return nullptr;
 		pAttribute = m_pElement->first_attribute();
-		while (pAttribute != m_pNextAttribute && !is(pAttribute))
+		while (pAttribute && !AreSameName(UtilsRapidXml::Name(pAttribute), i_Name))
 			pAttribute = pAttribute->next_attribute();
-		if (pAttribute == m_pNextAttribute)
-			pAttribute = nullptr;
+		if (!pAttribute)
+			return nullptr;
 	}
-	if (pAttribute)
-	{
-		m_pNextAttribute = pAttribute->next_attribute();
-		m_pNotes->m_RecognisedAttributes.push_back(pAttribute->name());
-	}
+	m_pNextAttribute = pAttribute->next_attribute();
+	m_pNotes->m_RecognisedAttributes.push_back(pAttribute->name());
+	return pAttribute;
+}
 
+bool VReaderNode::ProcessAttribute(std::string_view i_Name, std::string_view& o_rText, std::string_view,
+    std::string_view i_SchemaType, bool i_bRequired, VVersion i_Minimum, VVersion i_Maximum)
+{
+	const VXmlAttribute* const pAttribute = FindAttribute(i_Name);
+	if (!pAttribute && !i_bRequired)
+		return false;
 	if (!InRange(GetVersion(), i_Minimum, i_Maximum))
 	{
 		if (pAttribute)
 			m_pGlobal->m_Warnings.Add("Ignoring %1% attribute in %2% element. Not supported in files with version %3%",
-			    i_Name, m_Name, ToText(GetVersion()));
+			    i_Name, GetName(), ToText(GetVersion()));
 		return false;
 	}
 	if (!pAttribute)
 	{
-		if (i_bRequired)
-			m_pGlobal->m_Errors.Add("%1% element missing required attribute %2%", m_Name, i_Name);
+		m_pGlobal->m_Errors.Add("%1% element missing required attribute %2%", GetName(), i_Name);
 		return false;
 	}
 	o_rText = {pAttribute->value(), pAttribute->value_size()};
 	if (i_SchemaType == "xsd:ID")
 	{
-		const std::string_view element = UtilsRapidXml::Name(m_pElement);
-		const auto [it, bNew] = m_pGlobal->m_Ids.emplace(o_rText, element);
-		const bool bOtherKind = std::exchange(it->second, element) != element;
+		const auto [it, bNew] = m_pGlobal->m_Ids.emplace(o_rText, GetName());
+		const bool bOtherKind = std::exchange(it->second, GetName()) != GetName();
 		if (bOtherKind && m_pGlobal->m_bOwnFormsAreDetails)
 			m_pGlobal->m_Details.Add("Elements of two kinds have the name %1%", o_rText);
 		else if (!bNew)

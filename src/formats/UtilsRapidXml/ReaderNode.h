@@ -5,6 +5,7 @@
 #include "UtilsRapidXml/Node.h"
 
 #include <memory>
+#include <memory_resource>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -61,7 +62,8 @@ public:
 		bool m_bOutOfMemory = false;
 		/// The values of all xsd:ID attributes read so far, with the names of the elements that had them last; both
 		/// point into the document.
-		std::unordered_map<std::string_view, std::string_view> m_Ids;
+		std::pmr::monotonic_buffer_resource m_IdMemory;
+		std::pmr::unordered_map<std::string_view, std::string_view> m_Ids{&m_IdMemory};
 		std::vector<std::unique_ptr<VNotes>> m_SpareNotes;
 	};
 
@@ -73,7 +75,7 @@ public:
 
 	const std::shared_ptr<VGlobalInfo>& GetGlobalInfo() const { return m_pGlobal; }
 
-	const std::string& GetName() const override { return m_Name; }
+	std::string_view GetName() const override;
 	void SetVersion(VVersion i_Version) override { m_pGlobal->m_Version = i_Version; }
 	VVersion GetVersion() const override { return m_pGlobal->m_Version; }
 	void DeclareEnum(const IEnum&) override {}
@@ -89,11 +91,12 @@ public:
 private:
 	VReaderNode(VXmlNode* i_pElement, std::shared_ptr<VGlobalInfo> i_pGlobal);
 
+	/// The one of that name, null if there is none. What is found counts as recognised.
+	const VXmlAttribute* FindAttribute(std::string_view i_Name);
 	void TellIgnored();
 	void Match(const VDeclaration& i_rDeclaration, bool i_bChoice, std::string& io_rChosen);
 
 	VXmlNode* m_pElement;
-	std::string m_Name;
 	std::shared_ptr<VGlobalInfo> m_pGlobal;
 	std::unique_ptr<VNotes> m_pNotes;
 	std::size_t m_HighestPosition = 0;

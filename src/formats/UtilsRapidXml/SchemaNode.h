@@ -37,7 +37,7 @@ public:
 	VSchemaNode(const VSchemaNode&) = delete;
 	VSchemaNode& operator=(const VSchemaNode&) = delete;
 
-	const std::string& GetName() const override { return m_Name; }
+	std::string_view GetName() const override { return m_Name; }
 	void SetVersion(VVersion i_Version) override { m_pInfo->m_Version = i_Version; }
 	VVersion GetVersion() const override { return m_pInfo->m_Version; }
 	void DeclareEnum(const IEnum& i_rEnum) override;

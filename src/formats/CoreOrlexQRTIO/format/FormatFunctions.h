@@ -7,15 +7,16 @@
 
 #include <cstddef>
 #include <functional>
-#include <string>
+#include <memory_resource>
+#include <string_view>
 #include <unordered_map>
 #include <unordered_set>
 
 namespace CoreOrlexQRTIO
 {
 
-/// Elements of one kind by name; the first of a name counts.
-using VIndexByName = std::unordered_map<std::string, std::uint32_t>;
+/// Elements of one kind by name; the first of a name counts. The names are not copied.
+using VIndexByName = std::pmr::unordered_map<std::string_view, std::uint32_t>;
 
 /// What the format functions fill while they walk a document.
 struct VReading
@@ -28,11 +29,13 @@ struct VReading
 	/// 1.0 in a file that does not tell.
 	Format::VVersion m_Version = Format::c_1_0;
 	std::size_t m_ModelCount = 0;
-	VIndexByName m_SegmentsByName{};
-	VIndexByName m_MarkersByName{};
-	VIndexByName m_RotationsByName{};
+	/// What is looked up while the document is read, and goes at once.
+	std::pmr::monotonic_buffer_resource m_Memory{};
+	VIndexByName m_SegmentsByName{&m_Memory};
+	VIndexByName m_MarkersByName{&m_Memory};
+	VIndexByName m_RotationsByName{&m_Memory};
 	/// Filled when there are subspaces to read.
-	VIndexByName m_JointsByName{};
+	VIndexByName m_JointsByName{&m_Memory};
 	/// Of hashed ids only; counted ones do not collide.
 	std::unordered_set<std::uint32_t> m_MarkerIds{};
 	std::unordered_set<std::uint32_t> m_RotationIds{};

@@ -58,7 +58,9 @@ void FormatMarker(INode& io_rNode, VReading& io_rReading)
 	auto& [rMarker, rApplicationData, rExtras, rTarget, bPosition] = inHand;
 
 	const auto index = static_cast<std::uint32_t>(io_rReading.m_rSubject.m_Markers.size());
-	const bool bNamed = ReadAttribute(io_rNode, Table::c_Name, rMarker.m_Name);
+	std::string_view name;
+	const bool bNamed = ReadAttribute(io_rNode, Table::c_Name, name);
+	rMarker.m_Name = name;
 	rMarker.m_MarkerId = index;
 	if (io_rReading.m_bHashedIds && bNamed)
 	{
@@ -71,7 +73,7 @@ void FormatMarker(INode& io_rNode, VReading& io_rReading)
 		}
 	}
 
-	std::string segment;
+	std::string_view segment;
 	const bool bOnSegment = ReadAttribute(io_rNode, Table::c_Segment, segment);
 	if (bOnSegment)
 	{
@@ -114,7 +116,7 @@ void FormatMarker(INode& io_rNode, VReading& io_rReading)
 		io_rReading.m_rExtras.m_Targets.push_back({rMarker.m_Name, {}});
 	}
 	rExtras.m_Name = rMarker.m_Name;
-	io_rReading.m_MarkersByName.emplace(rMarker.m_Name, index);
+	io_rReading.m_MarkersByName.emplace(name, index);
 	if (io_rReading.m_bHashedIds)
 		io_rReading.m_MarkerIds.insert(rMarker.m_MarkerId);
 	io_rReading.m_rSubject.m_Markers.push_back(std::move(rMarker));
@@ -123,7 +125,7 @@ void FormatMarker(INode& io_rNode, VReading& io_rReading)
 }
 
 bool ReadStickMarker(INode& io_rNode, const Format::VAttribute& i_rAttribute, const VIndexByName& i_rMarkers,
-    std::string& o_rName, std::uint32_t& o_rIndex)
+    std::string_view& o_rName, std::uint32_t& o_rIndex)
 {
 	if (!ReadAttribute(io_rNode, i_rAttribute, o_rName))
 		return false;
@@ -142,7 +144,7 @@ void FormatStick(INode& io_rNode, VReading& io_rReading)
 	namespace Table = Format::Stick;
 	const std::size_t errors = io_rNode.GetErrorCount();
 	VSubjectApplicationData::VStick stick;
-	std::string name;
+	std::string_view name;
 	const VIndexByName& rMarkers = io_rReading.m_MarkersByName;
 	const bool bFirst = ReadStickMarker(io_rNode, Table::c_Marker1, rMarkers, name, stick.m_MarkerIndexA);
 	const bool bSecond = ReadStickMarker(io_rNode, Table::c_Marker2, rMarkers, name, stick.m_MarkerIndexB);

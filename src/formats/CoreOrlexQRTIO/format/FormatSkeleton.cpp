@@ -28,7 +28,9 @@ using UtilsRapidXml::ReadAttribute;
 	rSegment.m_ParentSegmentIndex = i_Parent;
 	rSegment.m_TreeDepth = i_Depth;
 
-	ReadAttribute(io_rNode, Table::c_Name, rSegment.m_Name);
+	std::string_view name;
+	ReadAttribute(io_rNode, Table::c_Name, name);
+	rSegment.m_Name = name;
 	std::array<double, 3> position{};
 	if (UtilsRapidXml::ReadList(io_rNode, Table::c_Position, 3, position.data()))
 		std::ranges::transform(position, rSegment.m_PreTranslation.begin(), NumberText::PrintG17);
@@ -66,7 +68,7 @@ using UtilsRapidXml::ReadAttribute;
 		return false;
 	}
 	rExtras.m_Name = rSegment.m_Name;
-	io_rReading.m_SegmentsByName.emplace(rSegment.m_Name, rSegment.m_SegmentIndex);
+	io_rReading.m_SegmentsByName.emplace(name, rSegment.m_SegmentIndex);
 	std::vector<double>& rConstraints = io_rReading.m_rSubject.m_TPoseConstraints;
 	rConstraints.insert(rConstraints.end(), rT.begin(), rT.end());
 	return true;

@@ -37,7 +37,7 @@ void ReadState(INode& io_rNode, const Format::VAttribute& i_rAttribute, VTarget&
 void ReadReference(INode& io_rNode, const Format::VAttribute& i_rAttribute, const VIndexByName& i_rNames,
     const char* i_pUnknown, std::vector<std::uint32_t>& io_rIndices)
 {
-	std::string name;
+	std::string_view name;
 	if (!ReadAttribute(io_rNode, i_rAttribute, name))
 		return;
 	const auto it = i_rNames.find(name);
@@ -49,7 +49,7 @@ void ReadReference(INode& io_rNode, const Format::VAttribute& i_rAttribute, cons
 
 void ReadObservation(INode& io_rNode, const VTargetKind& i_rKind, VReading& io_rReading, VTargetInHand& io_rInHand)
 {
-	std::string name;
+	std::string_view name;
 	if (!ReadAttribute(io_rNode, *i_rKind.m_pObservation, name))
 		return;
 	std::vector<std::uint32_t>& rIndices = io_rInHand.m_Target.m_RotationObservationIndices;
@@ -76,7 +76,7 @@ void ReadObservation(INode& io_rNode, const VTargetKind& i_rKind, VReading& io_r
 		return;
 	}
 	io_rReading.m_RotationsByName.emplace(name, index);
-	rRotations.push_back({name, id});
+	rRotations.push_back({std::string(name), id});
 	rIndices.push_back(index);
 }
 

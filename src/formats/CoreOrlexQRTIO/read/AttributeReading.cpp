@@ -7,7 +7,7 @@
 #include <boost/container/small_vector.hpp>
 
 #include <algorithm>
-#include <cmath>
+#include <array>
 
 namespace CoreOrlexQRTIO
 {
@@ -60,17 +60,13 @@ bool ReadReals(INode& io_rNode, const VAttribute& i_rAttribute, std::vector<doub
 	if (!ReadAttribute(io_rNode, i_rAttribute, rest))
 		return false;
 	std::vector<double> values;
-	while (!(rest = AfterWhite(rest)).empty())
+	std::array<double, 9> some;
+	while (const std::size_t count = NumberText::ScanReals(rest, some))
+		values.insert(values.end(), some.begin(), some.begin() + count);
+	if (!rest.empty())
 	{
-		double value = 0.0;
-		const std::size_t read = NumberText::ScanReal(rest, value);
-		rest.remove_prefix(read);
-		if (read == 0 || (!rest.empty() && !IsWhite(rest.front())) || !std::isfinite(value))
-		{
-			UtilsRapidXml::AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
-			return false;
-		}
-		values.push_back(value);
+		UtilsRapidXml::AddNotInterpreted(io_rNode, i_rAttribute.m_Name);
+		return false;
 	}
 	o_rValues = std::move(values);
 	return true;

@@ -56,19 +56,16 @@ public:
 
 	bool IsFine(std::string_view i_Expression, std::string& o_rError)
 	{
-		if (i_Expression.empty())
+		if (i_Expression.empty() || IsPlainNumber(i_Expression))
 			return true;
 		const auto isOperator = [](char i_Byte)
 		{ return i_Byte == '+' || i_Byte == '-' || i_Byte == '*' || i_Byte == '/'; };
 		const auto operation = std::find_if(i_Expression.begin() + 1, i_Expression.end(), isOperator);
 		const std::string_view number(i_Expression.begin(), operation);
 		const std::string_view tail(operation, i_Expression.end());
-		const bool bNumber = IsPlainNumber(number);
-		if (bNumber && tail.empty())
-			return true;
 		// Zero may make a term vanish that would be refused otherwise.
-		const bool bKnowable =
-		    bNumber && std::ranges::any_of(number, [](char i_Byte) { return i_Byte >= '1' && i_Byte <= '9'; });
+		const bool bKnowable = IsPlainNumber(number)
+		    && std::ranges::any_of(number, [](char i_Byte) { return i_Byte >= '1' && i_Byte <= '9'; });
 		if (bKnowable && m_FineTails.contains(tail))
 			return true;
 		double value = 0.0;
