@@ -185,8 +185,8 @@ QSGNode* VSceneFramebufferObject::updatePaintNode(QSGNode* io_pNode, UpdatePaint
 	if (!HasOpenGL(*window()))
 		return UpdateNoOpenGLNode(io_pNode, *window(), size());
 	QSGNode* const pNode = QQuickFramebufferObject::updatePaintNode(io_pNode, io_pData);
-	if (pNode && m_pSamples)
-		ShowSamples(static_cast<QSGGeometryNode&>(*pNode), m_pSamples);
+	if (const std::shared_ptr<const VSamples> pSamples = m_pSamples.lock(); pNode && pSamples)
+		ShowSamples(static_cast<QSGGeometryNode&>(*pNode), pSamples);
 	return pNode;
 }
 

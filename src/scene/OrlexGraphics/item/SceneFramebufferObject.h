@@ -198,8 +198,8 @@ private:
 	bool m_bTrackSelectionPending = false;
 	EFit m_Fit = EFit::None;
 	bool m_bWheelInFixedViews = false;
-	/// What the renderer draws into, null if that is not to be read.
-	std::shared_ptr<const VSamples> m_pSamples;
+	/// What the renderer draws into, if that can be read; the renderer and the node own it, as they end in its context.
+	std::weak_ptr<const VSamples> m_pSamples;
 	NVX::VConnection m_FrameConnection;
 	NVX::VConnection m_PublishedConnection;
 };
