@@ -16,12 +16,16 @@ bool CheckOpenGL()
 {
 	QOffscreenSurface surface;
 	surface.create();
-	QOpenGLContext context;
-	const bool bOpenGL = QQuickWindow::sceneGraphBackend() != QLatin1String("software") && context.create()
-	    && context.makeCurrent(&surface);
+	// One that is there already costs nothing.
+	QOpenGLContext own;
+	QOpenGLContext* const pShared = QOpenGLContext::globalShareContext();
+	QOpenGLContext& rContext = pShared ? *pShared : own;
+	const bool bOpenGL = QQuickWindow::sceneGraphBackend() != QLatin1String("software") && (pShared || own.create())
+	    && rContext.isValid() && rContext.makeCurrent(&surface);
 	// Each blink draws a whole panel.
-	if (!bOpenGL || CoreGraphics::IsSoftware(*context.functions()))
+	if (!bOpenGL || CoreGraphics::IsSoftware(*rContext.functions()))
 		QGuiApplication::styleHints()->setCursorFlashTime(0);
+	rContext.doneCurrent();
 	if (bOpenGL)
 		return true;
 	NVX_LOG("CoreGraphics", NVX::ELogWarning,

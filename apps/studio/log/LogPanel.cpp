@@ -44,7 +44,8 @@ VLogPanel::VLogPanel(VLogModel& i_rModel, QWidget* i_pParent)
 
 	auto* const pText = Named(new QLineEdit, "LogFilter", tr("Text that messages must hold"));
 	pText->setPlaceholderText(tr("Filter"));
-	pText->setClearButtonEnabled(true);
+	// Its icon is looked for in all themes, which an empty field can do without.
+	connect(pText, &QLineEdit::textChanged, pText, [pText] { pText->setClearButtonEnabled(true); });
 	connect(pText, &QLineEdit::textChanged, m_pFilter, &VLogFilter::SetText);
 
 	auto* const pCopy = Named(new QPushButton(tr("Copy")), "LogCopy", tr("Copy messages"));

@@ -48,9 +48,9 @@ void VFrameRenderer::SetScene(std::shared_ptr<VOrlexScene> i_pScene)
 void VFrameRenderer::SetSize(const QSize& i_rSize)
 {
 	m_Size = i_rSize;
-	m_pIdFramebuffer = std::make_unique<QOpenGLFramebufferObject>(i_rSize, QOpenGLFramebufferObject::Depth);
+	m_pIdFramebuffer.reset();
 	m_pPickFramebuffer.reset();
-	m_pOutlineFramebuffer = std::make_unique<QOpenGLFramebufferObject>(i_rSize, GL_TEXTURE_2D);
+	m_pOutlineFramebuffer.reset();
 }
 
 QOpenGLFramebufferObjectFormat VFrameRenderer::TargetFormat() const
@@ -75,7 +75,6 @@ void VFrameRenderer::BeginFrame()
 {
 	m_Context.ResetState();
 	m_Context.ResetScissor();
-	m_Context.m_pOutlineFramebuffer = m_pOutlineFramebuffer.get();
 	m_Context.m_ModifierState = m_Input.m_ModifierState;
 
 	const bool bYUp = m_pScene && m_pScene->FrameYUp();
@@ -101,6 +100,11 @@ void VFrameRenderer::Render(unsigned int i_Target)
 	m_Context.m_OutlineRectangle = OutlineRectangle();
 	if (!m_Context.m_OutlineRectangle.isEmpty())
 	{
+		if (!m_pIdFramebuffer)
+		{
+			m_pIdFramebuffer = std::make_unique<QOpenGLFramebufferObject>(m_Size, QOpenGLFramebufferObject::Depth);
+			m_pOutlineFramebuffer = std::make_unique<QOpenGLFramebufferObject>(m_Size, GL_TEXTURE_2D);
+		}
 		m_Context.m_Mode = CoreGraphics::ERenderId;
 		m_Context.BindFramebuffer(m_pIdFramebuffer.get());
 		RenderScene();
@@ -108,7 +112,9 @@ void VFrameRenderer::Render(unsigned int i_Target)
 	m_Context.m_Mode = CoreGraphics::ERenderNormal;
 	m_Context.m_DefaultFramebuffer = i_Target;
 	m_Context.BindDefaultFramebuffer();
-	m_Context.BindFramebufferTexture(c_SelectionUnit, *m_pIdFramebuffer);
+	m_Context.m_pOutlineFramebuffer = m_pOutlineFramebuffer.get();
+	if (m_pIdFramebuffer)
+		m_Context.BindFramebufferTexture(c_SelectionUnit, *m_pIdFramebuffer);
 	RenderScene();
 	m_Context.ResetState();
 	m_Context.ResetScissor();

@@ -95,6 +95,7 @@ private:
 	std::shared_ptr<VOrlexScene> m_pScene;
 	QSize m_Size;
 	std::uint64_t m_UpdateCount = 0;
+	/// Null until something is to be outlined, or to be picked.
 	std::unique_ptr<QOpenGLFramebufferObject> m_pIdFramebuffer;
 	std::unique_ptr<QOpenGLFramebufferObject> m_pPickFramebuffer;
 	std::unique_ptr<QOpenGLFramebufferObject> m_pOutlineFramebuffer;

@@ -166,8 +166,8 @@ void VRenderFloorGrid::RenderEdges(VRenderContext& io_rContext, const VFloor& i_
 	const QVector4D extents = ExtentsOf(i_rFloor);
 	io_rContext.SetUniform(m_Colour, c_EdgeColour);
 	io_rContext.BindVertices(m_Square);
-	DrawExtents(io_rContext, GL_LINE_LOOP, extents);
 	io_rContext.m_pFunctions->glPolygonOffset(1.0f, 2.0f);
+	DrawExtents(io_rContext, GL_LINE_LOOP, extents);
 	DrawExtents(io_rContext, GL_TRIANGLE_FAN, QVector4D(extents.x(), -c_HalfStripWidth, extents.z(), c_HalfStripWidth));
 	DrawExtents(io_rContext, GL_TRIANGLE_FAN, QVector4D(-c_HalfStripWidth, extents.y(), c_HalfStripWidth, extents.w()));
 }
