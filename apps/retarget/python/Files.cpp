@@ -5,6 +5,7 @@
 #include "retarget/python/Records.h"
 #include "retarget/subject/Findings.h"
 
+#include "CoreOrlexQRTIO/FieldsOfExtras.h"
 #include "CoreOrlexQRTIO/FormatVersions.h"
 #include "CoreOrlexQRTIO/Writer.h"
 #include "FBXIO/FBXReader.h"
@@ -97,6 +98,55 @@ py::list Bones(const std::string& i_rPath)
 	return list;
 }
 
+/// What Python can pickle: a record is the list of its fields, texts are bytes.
+template <typename T>
+py::object State(const T& i_rValue)
+{
+	if constexpr (CoreOrlexTypes::CRecord<T>)
+	{
+		py::list fields;
+		CoreOrlexTypes::ForEachField<T>(
+		    [&](const auto& i_rField) { fields.append(State(i_rValue.*i_rField.pMember)); });
+		return fields;
+	}
+	else if constexpr (std::is_same_v<T, std::string>)
+		return py::bytes(i_rValue);
+	else if constexpr (requires { i_rValue.size(); })
+	{
+		py::list items;
+		for (const auto& rItem : i_rValue)
+			items.append(State(rItem));
+		return items;
+	}
+	else
+		return py::cast(i_rValue);
+}
+
+template <typename T>
+T FromState(const py::handle& i_rState)
+{
+	T value{};
+	if constexpr (CoreOrlexTypes::CRecord<T>)
+	{
+		const auto fields = i_rState.cast<py::list>();
+		if (fields.size() != CoreOrlexTypes::c_FieldCount<T>)
+			throw py::value_error("the file was pickled by another version");
+		std::size_t index = 0;
+		CoreOrlexTypes::ForEachField<T>(
+		    [&](const auto& i_rField)
+		    {
+			    auto& rField = value.*i_rField.pMember;
+			    rField = FromState<std::remove_reference_t<decltype(rField)>>(fields[index++]);
+		    });
+	}
+	else if constexpr (!std::is_same_v<T, std::string> && requires { value.size(); })
+		for (const py::handle& rItem : i_rState.cast<py::list>())
+			value.push_back(FromState<typename T::value_type>(rItem));
+	else
+		value = i_rState.cast<T>();
+	return value;
+}
+
 } // namespace
 
 std::string FilePath(const std::string& i_rPath)
@@ -133,7 +183,7 @@ void DefineFiles(py::module_& io_rModule)
 	using VExtras = CoreOrlexQRTIO::VSubjectQRTExtras;
 	py::class_<VExtras>(io_rModule, "Extras")
 	    .def(py::init<>())
-	    .def("__deepcopy__", [](const VExtras& i_rExtras, const py::dict&) { return i_rExtras; });
+	    .def(py::pickle(&State<VExtras>, [](const py::object& i_rState) { return FromState<VExtras>(i_rState); }));
 	io_rModule.def("read", &Read);
 	io_rModule.def("write", &Write);
 	io_rModule.def("check", &Check);
