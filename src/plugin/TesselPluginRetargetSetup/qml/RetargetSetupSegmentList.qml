@@ -238,9 +238,13 @@ FocusScope {
 						segmentList.selectItem(index, mouse.modifiers & Qt.ControlModifier)
 				}
 			}
-			OrlexToolTip {
-				visible: row.about !== ""
-				text: row.about
+			Loader {
+				active: row.about !== ""
+				sourceComponent: OrlexToolTip {
+					parent: row
+					visible: true
+					text: row.about
+				}
 			}
 		}
 	}

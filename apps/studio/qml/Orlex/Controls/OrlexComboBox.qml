@@ -1,6 +1,4 @@
 import QtQuick 2.15
-import QtQuick.Templates 2.15 as T
-import QtQuick.Window 2.15
 import Orlex.Theme 1.0
 
 // Picks one of a list of texts. A long list can be filtered by typing: an entry stays if it holds every word typed, in
@@ -23,13 +21,15 @@ Item {
 	property bool invalid: false
 	property color textColor: Theme.text
 	readonly property alias hovered: mouse.containsMouse
-	readonly property alias popup: popup
+	// The list is made when it opens for the first time.
+	readonly property bool listed: list.item !== null && list.item.visible
 
 	// The operator picked an entry; currentIndex is it already.
 	signal activated(int index)
 
 	function pick(index) {
-		popup.close()
+		if (listed)
+			list.item.close()
 		if (index < 0 || index >= count)
 			return
 		currentIndex = index
@@ -53,9 +53,8 @@ Item {
 		return event.text.trim() !== "" && !(event.modifiers & (Qt.ControlModifier | Qt.AltModifier))
 	}
 	function open(filter) {
-		filterField.text = filterable ? filter : ""
-		popup.refill()
-		popup.open()
+		list.active = true
+		list.item.begin(filter)
 	}
 
 	implicitWidth: 140
@@ -84,7 +83,7 @@ Item {
 				pick(found)
 			else {
 				open("")
-				list.currentIndex = found
+				list.item.goTo(found)
 			}
 		}
 		else
@@ -93,10 +92,10 @@ Item {
 
 	FieldFrame {
 		anchors.fill: parent
-		focused: control.activeFocus || popup.visible
+		focused: control.activeFocus || control.listed
 		hovered: control.hovered
 		invalid: control.invalid
-		color: !control.enabled ? Theme.window : popup.visible ? Theme.base : Theme.button
+		color: !control.enabled ? Theme.window : control.listed ? Theme.base : Theme.button
 	}
 
 	MouseArea {
@@ -107,8 +106,8 @@ Item {
 		hoverEnabled: true
 		onPressed: {
 			control.forceActiveFocus(Qt.MouseFocusReason)
-			if (popup.visible)
-				popup.close()
+			if (control.listed)
+				list.item.close()
 			else
 				control.open("")
 		}
@@ -143,203 +142,17 @@ Item {
 	}
 
 	HoverTip {
-		hovered: control.hovered && !popup.visible
+		hovered: control.hovered && !control.listed
 		cut: caption.truncated
 		whole: control.displayText
 		toolTip: control.toolTip
 	}
 
-	onModelChanged: if (popup.visible) popup.refill()
+	onModelChanged: if (listed) list.item.refill()
 
-	T.Popup {
-		id: popup
-
-		// Indices of the entries that the filter leaves.
-		property var rows: []
-		readonly property real wanted: rowsHeight + (control.filterable ? Theme.controlHeight + 24 : 0) + 2 * padding
-		readonly property real rowsHeight: Math.max(1, Math.min(control.count, 18)) * Theme.itemHeight
-
-		function refill() {
-			const words = filterField.text.toLowerCase().split(" ").filter(word => word !== "")
-			const before = rows.length > 0 && list.currentIndex >= 0 ? rows[list.currentIndex] : control.currentIndex
-			const found = []
-			// "count" may not have followed the model yet.
-			for (let i = 0; control.model && i < control.model.length; ++i) {
-				const entry = words.length > 0 ? control.model[i].toLowerCase() : ""
-				if (words.every(word => entry.includes(word)))
-					found.push(i)
-			}
-			rows = found
-			// A name typed in full is meant, though longer ones that hold it may come first.
-			const typed = words.length > 0 ? filterField.text.trim().toLowerCase() : null
-			const whole = found.findIndex(i => control.model[i].trim().toLowerCase() === typed)
-			list.currentIndex = whole >= 0 ? whole : found.length > 0 ? Math.max(0, found.indexOf(before)) : -1
-			list.positionViewAtIndex(list.currentIndex, ListView.Contain)
-		}
-		// Wide enough for the longest entry. Below the box, or above it where there is more room.
-		function place() {
-			let longest = ""
-			for (let i = 0; i < control.count; ++i)
-				if (control.model[i].length > longest.length)
-					longest = control.model[i]
-			width = Math.min(control.Window.width - 2 * margins, Math.max(control.width, control.filterable ? 220 : 0,
-				Math.ceil(metrics.advanceWidth(longest.trim())) + 7 * (longest.length - longest.trim().length) + 50))
-			const box = control.mapToItem(null, 0, 0)
-			const room = control.Window.height
-			const below = room - box.y - control.height - 6
-			const above = box.y - 6
-			const up = below < wanted && above > below
-			height = Math.min(wanted, up ? above : below)
-			y = up ? -height - 2 : control.height + 2
-		}
-
-		readonly property FontMetrics metrics: FontMetrics {
-			font.pixelSize: Theme.fontSize
-		}
-
-		objectName: control.objectName + "Popup"
-		margins: 2
-		padding: 1
-		focus: true
-		closePolicy: T.Popup.CloseOnEscape | T.Popup.CloseOnPressOutsideParent
-		onAboutToShow: place()
-		onOpened: {
-			list.currentIndex = rows.length > 0 ? Math.max(0, rows.indexOf(control.currentIndex)) : -1
-			if (control.filterable)
-				filterField.forceActiveFocus()
-			else
-				list.forceActiveFocus()
-			list.positionViewAtIndex(list.currentIndex, ListView.Center)
-		}
-		// With the reason of popups nested focus scopes do not get it back.
-		onClosed: control.forceActiveFocus()
-
-		background: Rectangle {
-			color: Theme.dark
-			border.color: Theme.disabledText
-			radius: Theme.radius
-		}
-
-		contentItem: FocusScope {
-			Keys.onPressed: {
-				event.accepted = true
-				const page = Math.max(1, Math.floor(list.height / Theme.itemHeight) - 1)
-				const move = by => list.currentIndex = Math.max(0, Math.min(list.count - 1, list.currentIndex + by))
-				if (event.key === Qt.Key_Up)
-					move(-1)
-				else if (event.key === Qt.Key_Down)
-					move(1)
-				else if (event.key === Qt.Key_PageUp)
-					move(-page)
-				else if (event.key === Qt.Key_PageDown)
-					move(page)
-				else if (event.key === Qt.Key_Home)
-					move(-list.count)
-				else if (event.key === Qt.Key_End)
-					move(list.count)
-				else if (event.key === Qt.Key_Return || event.key === Qt.Key_Enter
-						|| event.key === Qt.Key_Space && !control.filterable)
-					control.pick(list.currentIndex >= 0 ? popup.rows[list.currentIndex] : -1)
-				else if (event.key === Qt.Key_Tab || event.key === Qt.Key_Backtab) {
-					popup.close()
-					control.nextItemInFocusChain(event.key === Qt.Key_Tab).forceActiveFocus(Qt.TabFocusReason)
-				}
-				else if (!control.filterable && control.typesText(event)) {
-					const found = control.findFrom(list.currentIndex, event.text)
-					if (found >= 0)
-						list.currentIndex = found
-				}
-				else
-					event.accepted = false
-			}
-
-			OrlexTextField {
-				id: filterField
-				objectName: control.objectName + "Filter"
-				visible: control.filterable
-				enabled: visible
-				focus: visible
-				x: 3
-				y: 3
-				width: parent.width - 6
-				placeholderText: "Type to filter"
-				onTextEdited: popup.refill()
-			}
-
-			ListView {
-				id: list
-				objectName: control.objectName + "List"
-				anchors.fill: parent
-				anchors.topMargin: control.filterable ? filterField.height + 6 : 0
-				anchors.bottomMargin: control.filterable ? 18 : 0
-				clip: true
-				focus: !control.filterable
-				model: popup.visible ? popup.rows : []
-				boundsBehavior: Flickable.StopAtBounds
-				highlightMoveDuration: 0
-				keyNavigationEnabled: false
-				T.ScrollBar.vertical: OrlexScrollBar {}
-
-				delegate: MouseArea {
-					id: entry
-
-					readonly property string text: modelData < control.count ? control.model[modelData] : ""
-					readonly property string name: text.trim()
-					readonly property int depth: text.length - text.replace(/^ +/, "").length
-
-					width: list.width
-					height: Theme.itemHeight
-					hoverEnabled: true
-					// Not on entering: the list also moves under a mouse that stands still.
-					onPositionChanged: list.currentIndex = index
-					onClicked: control.pick(modelData)
-					Accessible.role: Accessible.ListItem
-					Accessible.name: name
-
-					Rectangle {
-						anchors.fill: parent
-						color: modelData === control.currentIndex ? Theme.light
-							: entry.ListView.isCurrentItem ? Theme.midlight : "transparent"
-						border.width: entry.ListView.isCurrentItem ? 1 : 0
-						border.color: Theme.active
-					}
-					OrlexLabel {
-						x: 6 + Math.min(7 * entry.depth, 0.4 * parent.width)
-						width: parent.width - x - 12 - entryMark.width - 4
-						height: parent.height
-						text: entry.name
-						color: modelData === control.currentIndex ? Theme.bright : Theme.text
-					}
-					SideMark {
-						id: entryMark
-						name: control.filterable ? entry.name : ""
-						anchors.right: parent.right
-						anchors.rightMargin: 14
-						anchors.verticalCenter: parent.verticalCenter
-					}
-				}
-			}
-			Text {
-				visible: list.count === 0
-				anchors.fill: list
-				text: control.count === 0 ? "Nothing to choose from" : "Nothing holds \"" + filterField.text.trim() + "\""
-				textFormat: Text.PlainText
-				elide: Text.ElideRight
-				font.pixelSize: Theme.fontSize
-				color: Theme.disabledText
-				horizontalAlignment: Text.AlignHCenter
-				verticalAlignment: Text.AlignVCenter
-			}
-			Text {
-				visible: control.filterable
-				anchors.bottom: parent.bottom
-				x: 6
-				height: 18
-				text: list.count === control.count ? control.count + " entries" : list.count + " of " + control.count
-				font.pixelSize: Theme.fontSize - 2
-				color: Theme.disabledText
-				verticalAlignment: Text.AlignVCenter
-			}
-		}
+	Loader {
+		id: list
+		active: false
+		sourceComponent: ComboBoxList { box: control }
 	}
 }

@@ -23,7 +23,7 @@ Item {
 	OrlexComboBox {
 		id: box
 		objectName: editor.row ? editor.row.name : ""
-		width: parent.width - (fileButton.visible ? fileButton.width + 4 : 0)
+		width: parent.width - (fileButton.active ? fileButton.width + 4 : 0)
 		model: editor.row ? editor.row.enumNames : []
 		// A pick may load a file.
 		steps: false
@@ -43,9 +43,10 @@ Item {
 			editor.row.error = ""
 		}
 	}
-	FileButton {
+	Loader {
 		id: fileButton
-		row: editor.row
+		active: !!editor.row && editor.row.namesFiles
 		anchors.right: parent.right
+		sourceComponent: FileButton { row: editor.row }
 	}
 }

@@ -15,7 +15,6 @@ OrlexButton {
 	readonly property alias dialog: dialog.item
 
 	objectName: row ? row.name + "Browse" : ""
-	visible: access !== 0
 	width: 26
 	leftPadding: 0
 	rightPadding: 0

@@ -2,7 +2,8 @@ import QtQuick 2.15
 import Orlex.Controls 1.0
 import Orlex.Theme 1.0
 
-// One parameter: its label, the editor for its kind, why the last input was refused.
+// One parameter: its label, the editor for its kind, why the last input was refused. What only some parameters have is
+// made for those.
 Item {
 	id: row
 
@@ -49,6 +50,7 @@ Item {
 	readonly property int checkableSlider: 4
 	readonly property int colour: 5
 	readonly property int noFile: 0
+	readonly property bool namesFiles: (parameter.fileAccess || noFile) !== noFile
 
 	function isNumber(value) {
 		return typeof value === "number" && isFinite(value)
@@ -96,23 +98,25 @@ Item {
 	// What was refused belongs to the value that it was typed over.
 	onValueTextChanged: error = ""
 
-	OrlexCheckBox {
+	Loader {
 		id: switcher
-		objectName: row.name + "Switch"
-		visible: row.checkable
-		width: visible ? implicitWidth + 4 : 0
-		Accessible.name: row.label + " is set"
-		Component.onCompleted: checked = Qt.binding(() => row.editable)
-		onToggled: {
-			row.error = ""
-			row.wanted = checked
-			if (!checked)
-				row.groupModel.resetToDefault(row.parameterIndex)
-			else if (row.enumerated)
-				row.groupModel.setEnumIndex(row.parameterIndex, 0)
-			else if (row.parameter.type === "int" || row.parameter.type === "double")
-				row.commit(row.isNumber(row.parameter.minimum) ? String(row.parameter.minimum) : "0")
-			checked = Qt.binding(() => row.editable)
+		active: row.checkable
+		sourceComponent: OrlexCheckBox {
+			objectName: row.name + "Switch"
+			width: implicitWidth + 4
+			Accessible.name: row.label + " is set"
+			Component.onCompleted: checked = Qt.binding(() => row.editable)
+			onToggled: {
+				row.error = ""
+				row.wanted = checked
+				if (!checked)
+					row.groupModel.resetToDefault(row.parameterIndex)
+				else if (row.enumerated)
+					row.groupModel.setEnumIndex(row.parameterIndex, 0)
+				else if (row.parameter.type === "int" || row.parameter.type === "double")
+					row.commit(row.isNumber(row.parameter.minimum) ? String(row.parameter.minimum) : "0")
+				checked = Qt.binding(() => row.editable)
+			}
 		}
 	}
 	OrlexLabel {
@@ -126,7 +130,7 @@ Item {
 	Loader {
 		id: editor
 		x: row.labelWidth + Theme.spacing
-		width: row.width - x - (resetter.visible ? resetter.width + 2 : 0) - (unitLabel.visible ? unitLabel.width + 4 : 0)
+		width: row.width - x - (resetter.active ? resetter.width + 2 : 0) - (unitLabel.active ? unitLabel.width + 4 : 0)
 		enabled: row.editable
 		Component.onCompleted: source = Qt.binding(() => row.editorUrl())
 		onLoaded: {
@@ -134,31 +138,34 @@ Item {
 			item.width = Qt.binding(() => editor.width)
 		}
 	}
-	OrlexLabel {
+	Loader {
 		id: unitLabel
-		objectName: row.name + "Unit"
-		visible: row.unit !== ""
-		anchors.right: resetter.visible ? resetter.left : parent.right
-		height: Theme.controlHeight
-		text: row.unit
-		enabled: row.editable
+		active: row.unit !== ""
+		anchors.right: resetter.active ? resetter.left : parent.right
+		sourceComponent: OrlexLabel {
+			objectName: row.name + "Unit"
+			height: Theme.controlHeight
+			text: row.unit
+			enabled: row.editable
+		}
 	}
-	OrlexButton {
+	Loader {
 		id: resetter
-		objectName: row.name + "Reset"
+		active: row.defaultText !== "" && row.valueText !== row.defaultText
 		anchors.right: parent.right
-		width: 16
-		height: Theme.controlHeight
-		leftPadding: 0
-		rightPadding: 0
-		text: "\u21ba"
-		toolTip: "Back to the default" + (row.defaultText !== "" ? ": " + row.defaultText : "")
-		Accessible.name: row.label + ": back to the default"
-		visible: row.defaultText !== "" && row.valueText !== row.defaultText
-		background: null
-		onClicked: {
-			row.error = ""
-			row.groupModel.resetToDefault(row.parameterIndex)
+		sourceComponent: OrlexButton {
+			objectName: row.name + "Reset"
+			width: 16
+			leftPadding: 0
+			rightPadding: 0
+			text: "\u21ba"
+			toolTip: "Back to the default" + (row.defaultText !== "" ? ": " + row.defaultText : "")
+			Accessible.name: row.label + ": back to the default"
+			background: null
+			onClicked: {
+				row.error = ""
+				row.groupModel.resetToDefault(row.parameterIndex)
+			}
 		}
 	}
 	Text {

@@ -35,7 +35,7 @@ Item {
 	// The start of a long text tells more than its end; of a path the end.
 	function showEnd() {
 		if (!field.activeFocus)
-			field.cursorPosition = fileButton.visible ? field.length : 0
+			field.cursorPosition = fileButton.active ? field.length : 0
 	}
 
 	implicitHeight: Theme.controlHeight
@@ -52,7 +52,7 @@ Item {
 	OrlexTextField {
 		id: field
 		objectName: editor.row ? editor.row.name : ""
-		width: parent.width - (fileButton.visible ? fileButton.width + 4 : 0)
+		width: parent.width - (fileButton.active ? fileButton.width + 4 : 0)
 		height: Theme.controlHeight
 		error: editor.row ? editor.row.error : ""
 		placeholderText: editor.row && !editor.row.parameter.hasValue ? editor.row.defaultText : ""
@@ -74,9 +74,10 @@ Item {
 			editor.restore()
 		}
 	}
-	FileButton {
+	Loader {
 		id: fileButton
-		row: editor.row
+		active: !!editor.row && editor.row.namesFiles
 		anchors.right: parent.right
+		sourceComponent: FileButton { row: editor.row }
 	}
 }
