@@ -2,6 +2,7 @@
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 
 #include <algorithm>
+#include <atomic>
 #include <future>
 #include <unordered_map>
 
@@ -36,55 +37,52 @@ void Store(const VLanePose& i_rPose, int i_Lane, Rotation::VPose<double>& o_rPos
 		o_rPose.t[i] = i_rPose.t[i][i_Lane];
 }
 
-/// What does not depend on the frame.
+/// What of a segment does not depend on the frame.
 struct VRest
 {
 	const IJointFK* m_pJoint;
-	/// Null at the root.
-	const VLanePose* m_pParent;
+	/// -1 at a root.
+	std::ptrdiff_t m_Parent;
 	Rotation::VPose<double> m_Base;
 	Rotation::VPose<double> m_InversePost;
 };
 
-/// The poses of the frames from i_First to before i_End.
-void Compute(const VSegmentTree& i_rTree, std::size_t i_States, const double* i_pStates, std::size_t i_First,
-    std::size_t i_End, Rotation::VPose<double>* o_pPoses)
+std::vector<VRest> Rests(const VSegmentTree& i_rTree)
 {
-	std::vector<VLanePose> worlds(i_rTree.size());
-	std::unordered_map<const IComputeSegmentFK*, const VLanePose*> worldOf;
+	std::unordered_map<const IComputeSegmentFK*, std::ptrdiff_t> indices;
 	std::vector<VRest> rests;
 	rests.reserve(i_rTree.size());
 	for (const auto& rpSegment : i_rTree)
 	{
-		const auto parent = std::find_if(i_rTree.begin(), i_rTree.end(),
-		    [&](const auto& i_rpOther) { return i_rpOther.get() == rpSegment->Parent(); });
-		rests.push_back(
-		    {&rpSegment->Joint(), parent == i_rTree.end() ? nullptr : &worlds[std::size_t(parent - i_rTree.begin())],
-		        rpSegment->JointBasePoseInParent(), Rotation::Inverse(rpSegment->PostPose())});
+		const auto parent = indices.find(rpSegment->Parent());
+		indices.emplace(rpSegment.get(), std::ptrdiff_t(rests.size()));
+		rests.push_back({&rpSegment->Joint(), parent == indices.end() ? -1 : parent->second,
+		    rpSegment->JointBasePoseInParent(), Rotation::Inverse(rpSegment->PostPose())});
 	}
-	std::vector<VLanes> states(i_States);
-	for (std::size_t frame = i_First; frame < i_End; frame += 2)
+	return rests;
+}
+
+/// The poses of two frames, which may be the same.
+/// @param io_rWorlds one for each segment, what they hold does not matter.
+void Compute(const std::vector<VRest>& i_rRests, const VLanes* i_pStates, std::vector<VLanePose>& io_rWorlds,
+    Rotation::VPose<double>* o_pFirst, Rotation::VPose<double>* o_pSecond)
+{
+	const VLanes* pState = i_pStates;
+	for (std::size_t i = 0; i < i_rRests.size(); ++i)
 	{
-		// The last of an odd number stands in both lanes.
-		const std::size_t second = std::min(frame + 1, i_End - 1);
-		for (std::size_t i = 0; i < i_States; ++i)
-			states[i] = {i_pStates[frame * i_States + i], i_pStates[second * i_States + i]};
-		const VLanes* pState = states.data();
-		for (std::size_t i = 0; i < rests.size(); ++i)
-		{
-			VLanePose motion;
-			rests[i].m_pJoint->MoveLanes(pState, motion);
-			VLanePose local;
-			ComposeLanes(rests[i].m_Base, motion, local);
-			if (rests[i].m_pParent)
-				ComposeLanes(*rests[i].m_pParent, local, worlds[i]);
-			else
-				worlds[i] = local;
-			VLanePose segment;
-			ComposeLanes(worlds[i], rests[i].m_InversePost, segment);
-			Store(segment, 0, o_pPoses[frame * rests.size() + i]);
-			Store(segment, 1, o_pPoses[second * rests.size() + i]);
-		}
+		const VRest& rRest = i_rRests[i];
+		VLanePose motion;
+		rRest.m_pJoint->MoveLanes(pState, motion);
+		VLanePose local;
+		ComposeLanes(rRest.m_Base, motion, local);
+		if (rRest.m_Parent >= 0)
+			ComposeLanes(io_rWorlds[std::size_t(rRest.m_Parent)], local, io_rWorlds[i]);
+		else
+			io_rWorlds[i] = local;
+		VLanePose segment;
+		ComposeLanes(io_rWorlds[i], rRest.m_InversePost, segment);
+		Store(segment, 0, o_pFirst[i]);
+		Store(segment, 1, o_pSecond[i]);
 	}
 }
 
@@ -95,22 +93,36 @@ void VComputeSubjectFK::UpdateMany(
 {
 	if (m_SegmentTree.empty())
 		return;
-	std::size_t frames = o_Poses.size() / m_SegmentTree.size();
+	const std::size_t segments = m_SegmentTree.size();
+	std::size_t frames = o_Poses.size() / segments;
 	if (m_NumberOfStates > 0)
 		frames = std::min(frames, i_States.size() / m_NumberOfStates);
-	// A thread is worth its start from some thousand poses on.
-	const std::size_t worthwhile = 1 + frames * m_SegmentTree.size() / 4096;
-	const std::size_t threads = std::clamp<std::size_t>(i_Threads, 1, worthwhile);
-	const auto compute = [&](std::size_t i_Part)
+	const std::vector<VRest> rests = Rests(m_SegmentTree);
+	// Threads take the next frames whenever they are done with some, so that one which starts late or has no processor
+	// of its own keeps none from its end.
+	const std::size_t step = 2 * (1 + 512 / segments);
+	std::atomic<std::size_t> next = 0;
+	const auto compute = [&]
 	{
-		Compute(m_SegmentTree, m_NumberOfStates, i_States.data(), frames * i_Part / threads,
-		    frames * (i_Part + 1) / threads, o_Poses.data());
+		std::vector<VLanes> states(m_NumberOfStates);
+		std::vector<VLanePose> worlds(segments);
+		for (std::size_t first; (first = next.fetch_add(step, std::memory_order_relaxed)) < frames;)
+			for (std::size_t frame = first; frame < std::min(first + step, frames); frame += 2)
+			{
+				// The last of an odd number stands in both lanes.
+				const std::size_t second = std::min(frame + 1, frames - 1);
+				for (std::size_t i = 0; i < m_NumberOfStates; ++i)
+					states[i] = {i_States[frame * m_NumberOfStates + i], i_States[second * m_NumberOfStates + i]};
+				Compute(rests, states.data(), worlds, &o_Poses[frame * segments], &o_Poses[second * segments]);
+			}
 	};
-	// What has no thread of its own, where none can be started, is computed when it is waited for.
+	// A thread is worth its start from some thousand poses on.
+	const std::size_t worthwhile = 1 + frames * segments / 4096;
+	// What has no thread of its own, where none can be started, is waited for, and finds nothing left.
 	std::vector<std::future<void>> others;
-	for (std::size_t part = 1; part < threads; ++part)
-		others.push_back(std::async(std::launch::async | std::launch::deferred, compute, part));
-	compute(0);
+	for (std::size_t thread = std::clamp<std::size_t>(i_Threads, 1, worthwhile); thread > 1; --thread)
+		others.push_back(std::async(std::launch::async | std::launch::deferred, compute));
+	compute();
 	for (std::future<void>& rOther : others)
 		rOther.get();
 }
