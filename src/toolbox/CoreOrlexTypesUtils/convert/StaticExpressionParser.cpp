@@ -264,6 +264,12 @@ template <typename TLinearFactory>
 bool VDynamicExpressionParserBase<TLinearFactory>::EvaluateProduct(
     std::string_view i_Expression, double& o_rValue) const
 {
+	// Half of all: bounds, and turns that are none.
+	if (i_Expression == "0")
+	{
+		o_rValue = 0.0;
+		return true;
+	}
 	const char* const pEnd = i_Expression.data() + i_Expression.size();
 	const char* const pDigits = i_Expression.data() + i_Expression.starts_with('-');
 	if (pDigits == pEnd || !((*pDigits >= '0' && *pDigits <= '9') || *pDigits == '.'))
