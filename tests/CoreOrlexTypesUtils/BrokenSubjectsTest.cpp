@@ -133,7 +133,7 @@ private:
 		static constexpr std::size_t c_Covariances[] = {0, 0, 9, 0, 1, 0, 4, 63, 0, 0};
 		static constexpr std::size_t c_Markers[] = {0, 1, 1, 1, 1, 1, 1, 3, 0, 0};
 		const std::size_t type = Below(10);
-		o_rTarget.m_Type = VTarget::ETargetType(Below(30) ? type : Below(2) ? 10 : -5);
+		o_rTarget.m_Type = VTarget::ETargetType(Below(30) ? int(type) : Below(2) ? 10 : -5);
 		o_rTarget.m_MarkerIndices = Indices(c_Markers[type]);
 		o_rTarget.m_RotationObservationIndices = Indices(type >= 8);
 		o_rTarget.m_SegmentIndices = Indices(1);

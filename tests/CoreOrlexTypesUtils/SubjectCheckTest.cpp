@@ -142,7 +142,7 @@ TEST_F(SubjectCheck, GoodSubjectsPassInSilence)
 
 TEST_F(SubjectCheck, SizesOfTargetsByType)
 {
-	const auto resize = [](auto& io_rList, int i_Step) { io_rList.resize(io_rList.size() + i_Step); };
+	const auto resize = [](auto& io_rList, int i_Step) { io_rList.resize(std::size_t(int(io_rList.size()) + i_Step)); };
 	for (int type = 1; type < 10; ++type)
 	{
 		SCOPED_TRACE(type);

@@ -19,8 +19,8 @@ using NVX::IO::VVariant;
 std::string Hex(const std::string& i_rBytes)
 {
 	std::string text;
-	for (const unsigned char byte : i_rBytes)
-		((text += "0123456789abcdef"[byte >> 4]) += "0123456789abcdef"[byte & 15]);
+	for (const char byte : i_rBytes)
+		((text += "0123456789abcdef"[byte >> 4 & 15]) += "0123456789abcdef"[byte & 15]);
 	return text;
 }
 

@@ -104,7 +104,8 @@ private:
 	void Header(
 	    std::size_t i_End, std::size_t i_Count, std::size_t i_Size, const std::string& i_rName, char i_NameLie = 0)
 	{
-		m_Bytes += Bytes(Number(i_End), Number(i_Count), Number(i_Size), char(i_rName.size() + i_NameLie), i_rName);
+		m_Bytes +=
+		    Bytes(Number(i_End), Number(i_Count), Number(i_Size), char(int(i_rName.size()) + i_NameLie), i_rName);
 	}
 
 	std::uint32_t m_Version;

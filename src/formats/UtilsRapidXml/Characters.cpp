@@ -15,14 +15,14 @@ bool IsPlain(char i_Byte)
 /// The length of the sequence that begins here, 0 if it is broken or no character of XML.
 std::size_t SequenceLength(std::string_view i_Text)
 {
-	const unsigned char first = i_Text[0];
+	const auto first = static_cast<unsigned char>(i_Text[0]);
 	const std::size_t length = first < 0x80 ? 1 : first >> 5 == 6 ? 2 : first >> 4 == 14 ? 3 : first >> 3 == 30 ? 4 : 0;
 	if (length == 0 || length > i_Text.size())
 		return 0;
 	char32_t code = length == 1 ? first : first & (0x7F >> length);
 	for (std::size_t i = 1; i < length; ++i)
 	{
-		const unsigned char byte = i_Text[i];
+		const auto byte = static_cast<unsigned char>(i_Text[i]);
 		if (byte >> 6 != 2)
 			return 0;
 		code = code << 6 | (byte & 0x3F);
