@@ -3,7 +3,7 @@
 #include "CommandLineText/ProgressBar.h"
 #include "CommandLineText/Suggest.h"
 #include "CommandLineText/System.h"
-#include "CommandLineText/VisibleText.h"
+#include "math/VisibleText.h"
 
 #include <nlohmann/json.hpp>
 
@@ -197,7 +197,7 @@ std::string OneLine(std::string i_Message)
 {
 	while (!i_Message.empty() && (i_Message.back() == '\n' || i_Message.back() == '\r'))
 		i_Message.pop_back();
-	return VisibleLine(i_Message);
+	return VisibleText::OnOneLine(i_Message);
 }
 
 void PrintMessage(const NVX::VLogCategory& i_rCategory, int i_Level, const std::string& i_rMessage)

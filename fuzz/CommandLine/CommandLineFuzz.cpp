@@ -2,8 +2,8 @@
 #include "../Require.h"
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Parsing.h"
-#include "CommandLineText/VisibleText.h"
 #include "DebugServices/GlobalLog.h"
+#include "math/VisibleText.h"
 #include "retarget/Program.h"
 
 #include <cstdint>
@@ -34,8 +34,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* i_pData, std::size_t i
 	{
 		const std::string text = rError.what();
 		Require(!text.empty() && rError.Status() != CommandLine::EFine, "a refusal tells why");
-		const std::string line = CommandLine::VisibleLine(text);
-		Require(CommandLine::VisibleLine(line) == line, "what is shown has nothing left to be made visible");
+		const std::string line = VisibleText::OnOneLine(text);
+		Require(VisibleText::OnOneLine(line) == line, "what is shown has nothing left to be made visible");
 	}
 	return 0;
 }

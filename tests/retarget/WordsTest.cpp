@@ -4,7 +4,6 @@
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/ProgressBar.h"
 #include "CommandLineText/Suggest.h"
-#include "CommandLineText/VisibleText.h"
 #include "retarget/subject/Elements.h"
 #include "retarget/text/Output.h"
 #include "retarget/text/Table.h"
@@ -42,24 +41,6 @@ std::string RefusalOf(TCall&& i_rCall)
 		return rError.what();
 	}
 	return "accepted";
-}
-
-TEST(VisibleText, NamesReachNobodyRaw)
-{
-	struct VTextRow
-	{
-		const char* m_pText;
-		const char* m_pLine;
-		const char* m_pJson;
-	};
-	for (const VTextRow& rRow : {VTextRow{"\xC3\xA9t\xC3\xA9", "\xC3\xA9t\xC3\xA9", "\xC3\xA9t\xC3\xA9"},
-	         {"a\x1B[31m\n\x7F", "a [31m  ", "a\x1B[31m\n\\u007F"}, {"\xC2\x9BK", "[U+9B]K", "\\u009BK"},
-	         {"\x9B", "[0x9B]", "\x9B"}, {"\xE2\x80\xAEgpj", "[U+202E]gpj", "\\u202Egpj"},
-	         {"\xF3\xA0\x80\x81", "[U+E0001]", "\\uDB40\\uDC01"}})
-	{
-		EXPECT_EQ(VisibleLine(rRow.m_pText), rRow.m_pLine);
-		EXPECT_EQ(VisibleJson(rRow.m_pText), rRow.m_pJson);
-	}
 }
 
 TEST(Suggest, CountsEdits)

@@ -4,7 +4,9 @@
 
 #include "TesselPluginInterface/ISelectionManager.h"
 #include "studio/host/Services.h"
+#include "studio/panel/RetargetPanel.h"
 
+#include <QAbstractItemView>
 #include <QApplication>
 #include <QClipboard>
 #include <QFile>
@@ -13,6 +15,10 @@
 #include <QLabel>
 #include <QMessageBox>
 #include <QProcess>
+#include <QQuickItem>
+#include <QQuickWidget>
+#include <QQuickWindow>
+#include <QRegularExpression>
 #include <QTest>
 #include <QTreeWidget>
 #include <QWindow>
@@ -175,6 +181,69 @@ TEST_F(Review, ChecksThePose)
 	EXPECT_EVENTUALLY(!Dialog("AlignToSource"));
 	Press("PoseCheck", "ReviewAgain");
 	EXPECT_FALSE(Copied("PoseCheck").contains("\tlook\t"));
+}
+
+/// What can be read of a thing; what is typed into a field is the name itself.
+QStringList Texts(const QObject& i_rThing)
+{
+	if (i_rThing.property("cursorPosition").isValid())
+		return {};
+	QStringList texts;
+	for (const char* const pName : {"text", "displayText", "toolTip", "title", "windowTitle", "informativeText"})
+		texts << i_rThing.property(pName).toString();
+	const auto* const pView = qobject_cast<const QAbstractItemView*>(&i_rThing);
+	const QAbstractItemModel* const pModel = pView ? pView->model() : nullptr;
+	if (pModel)
+		for (const QModelIndex& rIndex :
+		    pModel->match(pModel->index(0, 0), Qt::DisplayRole, "*", -1, Qt::MatchWildcard | Qt::MatchRecursive))
+			for (int column = 0; column < pModel->columnCount(); ++column)
+				for (const int role : {Qt::DisplayRole, Qt::ToolTipRole})
+					texts << rIndex.siblingAtColumn(column).data(role).toString();
+	if (const auto* const pItem = qobject_cast<const QQuickItem*>(&i_rThing))
+		for (const QQuickItem* const pChild : pItem->childItems())
+			texts << Texts(*pChild);
+	return texts;
+}
+
+TEST_F(Review, ShowsWhatIsHiddenInNames)
+{
+	const auto write = [this](const char* i_pFrom, const char* i_pTo)
+	{
+		QByteArray bytes = Content(i_pFrom);
+		for (const char* const pName : {"Pelvis", "haunch", "performer"})
+			for (const char* const pEnd : {"\"", "&gt;", "}"})
+				bytes.replace(QByteArray(pName) + pEnd, QByteArray("&#x202E;&#9;") + pName + pEnd);
+		QFile file(File(i_pTo));
+		EXPECT_TRUE(file.open(QIODevice::WriteOnly) && file.write(bytes) == bytes.size()) << i_pTo;
+		return file.fileName();
+	};
+	const char* const pFile = "\u202Exeh.qrr";
+	write("performer.qrs", "\u202E\tperformer.qrs");
+	EXPECT_EVENTUALLY(
+	    m_pOperator->Property("SourceSkeleton", "model").toStringList().contains("[U+202E][U+09]performer"));
+	ASSERT_TRUE(m_pWindow->Open(write("hero.qrr", pFile)));
+	EXPECT_EVENTUALLY(Names("sourceSegments").value(0) == "[U+202E][U+09]Pelvis");
+	SelectPair("[U+202E][U+09]Pelvis", "[U+202E][U+09]haunch");
+	m_pOperator->Click("removeUnnecessaryJoints");
+	m_pOperator->Hover("targetSegmentsRow0");
+	for (const char* const pAction :
+	    {"CompareWithSaved", "ShowAdvice", "CheckPose", "ProposeTargets", "RebindToFbx", "AlignToSourceAction"})
+		m_pOperator->ChooseInMenu("ToolsMenu", pAction);
+	EXPECT_EVENTUALLY(IsLookedAt("Advice"));
+	QStringList texts =
+	    Texts(*qobject_cast<QQuickWidget*>(m_pWindow->RetargetPanel()->Widget())->quickWindow()->contentItem());
+	texts << Texts(*m_pWindow);
+	for (const QObject* const pThing : m_pWindow->findChildren<QObject*>())
+		texts << Texts(*pThing);
+	EXPECT_GT(texts.filter("[U+202E][U+09]haunch").size(), 12);
+	EXPECT_GT(texts.filter("[U+202E]xeh.qrr").size(), 3) << "title, panel, menus";
+	for (const QString& rText : texts.filter(QRegularExpression("[\u202A-\u202E\u2066-\u2069\t]")))
+		ADD_FAILURE() << rText.toStdString();
+	// The names are what they were.
+	EXPECT_EQ(m_pWindow->RetargetPanel()->ItemsNamedIn("'\u202E\thaunch'").size(), 1u);
+	m_pWindow->RetargetPanel()->SaveTo(File(pFile));
+	EXPECT_FALSE(m_pWindow->isWindowModified());
+	EXPECT_TRUE(QString::fromUtf8(Content(pFile)).contains("\"\u202E&#9;haunch\""));
 }
 
 TEST_F(Review, WritesAReport)

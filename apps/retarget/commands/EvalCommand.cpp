@@ -1,11 +1,11 @@
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/Parsing.h"
-#include "CommandLineText/VisibleText.h"
 #include "retarget/commands/Commands.h"
 #include "retarget/text/Output.h"
 
 #include "CoreOrlexTypesUtils/convert/StaticExpressionParser.h"
 #include "math/NumberText.h"
+#include "math/VisibleText.h"
 
 #include <cmath>
 #include <cstdio>
@@ -88,7 +88,7 @@ EExitStatus ShowValue(const VEvalSettings& i_rSettings)
 	{
 		if (JsonAsked())
 			throw VCommandError(EBadInput, diagnostic);
-		std::fprintf(stderr, "%s\n", VisibleLine(diagnostic).c_str());
+		std::fprintf(stderr, "%s\n", VisibleText::OnOneLine(diagnostic).c_str());
 		return EBadInput;
 	}
 	PrintResult({{"value", value}}, ValueText(value) + "\n");

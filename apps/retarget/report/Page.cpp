@@ -1,6 +1,6 @@
 #include "retarget/report/Page.h"
 
-#include "CommandLineText/VisibleText.h"
+#include "math/VisibleText.h"
 
 #include <boost/archive/iterators/base64_from_binary.hpp>
 #include <boost/archive/iterators/transform_width.hpp>
@@ -55,7 +55,7 @@ std::string Cell(const std::string& i_rText)
 std::string EscapedForHtml(std::string_view i_Text)
 {
 	std::string text;
-	for (const char byte : VisibleText(i_Text))
+	for (const char byte : VisibleText::Of(i_Text))
 		text += byte == '&' ? "&amp;"
 		    : byte == '<'   ? "&lt;"
 		    : byte == '>'   ? "&gt;"

@@ -2,7 +2,7 @@
 
 #include "CommandLineText/ExitStatus.h"
 #include "CommandLineText/Messages.h"
-#include "CommandLineText/VisibleText.h"
+#include "math/VisibleText.h"
 
 #include <cerrno>
 #include <cstdio>
@@ -77,7 +77,7 @@ std::string JsonText(const VJson& i_rValue)
 {
 	std::string text;
 	Append(text, i_rValue, 0);
-	return VisibleJson(text);
+	return VisibleText::InJson(text);
 }
 
 void PrintResult(const VJson& i_rJson, std::string_view i_Text)
@@ -95,7 +95,7 @@ void PrintJson(const VJson& i_rValue)
 
 std::string Printable(std::string_view i_Text)
 {
-	return VisibleLine(i_Text);
+	return VisibleText::OnOneLine(i_Text);
 }
 
 } // namespace CommandLine

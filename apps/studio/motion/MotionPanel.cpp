@@ -332,7 +332,7 @@ void VMotionPanel::UpdateControls()
 		text = tr("%1: the character has no targets yet, and does not follow").arg(name);
 	else
 		text = name;
-	m_pFile->setText(text);
+	m_pFile->setText(ShownText(text));
 	m_pFile->setToolTip(PlainToolTip(text == name ? m_Player.Path() : text));
 }
 

@@ -2,6 +2,7 @@
 
 #include "CoreOrlexTypes/SubjectApplicationData.h"
 #include "TakeSolve/TargetWords.h"
+#include "math/VisibleText.h"
 #include "studio/motion/TakePlayer.h"
 
 #include <cmath>
@@ -84,10 +85,11 @@ void VResidualModel::MakeRows()
 		for (std::size_t i = 0; pSubject && i < pSubject->m_Targets.size(); ++i)
 		{
 			const auto& rTarget = pSubject->m_Targets[i];
-			rows.push_back({pData && i < pData->m_Targets.size() ? QString::fromStdString(pData->m_Targets[i].m_Name)
-			                                                     : QString(),
-			    QString::fromStdString(TakeSolve::SourceOf(*pSubject, rTarget)),
-			    QString::fromStdString(TakeSolve::TargetOf(*pSubject, rTarget)), TakeSolve::IsRotationTarget(rTarget)});
+			const auto shown = [](const std::string& i_rName)
+			{ return QString::fromStdString(VisibleText::Of(i_rName)); };
+			rows.push_back({pData && i < pData->m_Targets.size() ? shown(pData->m_Targets[i].m_Name) : QString(),
+			    shown(TakeSolve::SourceOf(*pSubject, rTarget)), shown(TakeSolve::TargetOf(*pSubject, rTarget)),
+			    TakeSolve::IsRotationTarget(rTarget)});
 		}
 	}
 	// A weight is no other list: what is chosen, and where the list stands, stay.

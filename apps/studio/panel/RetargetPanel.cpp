@@ -9,6 +9,7 @@
 #include "TesselPluginInterface/IParameterRegistry.h"
 #include "studio/host/UnsavedWork.h"
 #include "studio/panel/FileKind.h"
+#include "studio/window/PlainTexts.h"
 
 #include <QAbstractItemModel>
 #include <QAction>
@@ -167,7 +168,7 @@ void VRetargetPanel::MarkDrop(const QStringList& i_rPaths)
 	for (const QString& rPath : i_rPaths)
 	{
 		const EFileKind kind = KindOf(rPath);
-		const QString name = QFileInfo(rPath).fileName();
+		const QString name = ShownFileName(rPath);
 		lines << (kind == EFileKind::EOther ? tr("%1 cannot be opened").arg(name)
 		                                    : tr("%1 opens as the %2").arg(name, KindName(kind)));
 		if (const QRectF place = PlaceOf(kind); !place.isEmpty())
@@ -542,10 +543,12 @@ std::vector<NVX::ISelectionItem> VRetargetPanel::ItemsNamedIn(const QString& i_r
 	// Names stand in quotes, targets by their number.
 	static const QRegularExpression s_Name(QStringLiteral("'([^']+)'|\"([^\"]+)\""));
 	static const QRegularExpression s_Target(QStringLiteral("\\b[Tt]arget #?(\\d+)"));
+	// As the models show them.
+	const QString message = ShownText(i_rMessage);
 	QStringList names;
-	for (auto match = s_Name.globalMatch(i_rMessage); match.hasNext();)
+	for (auto match = s_Name.globalMatch(message); match.hasNext();)
 		names << match.next().capturedTexts().last();
-	const QRegularExpressionMatch target = s_Target.match(i_rMessage);
+	const QRegularExpressionMatch target = s_Target.match(message);
 
 	std::vector<NVX::ISelectionItem> items;
 	const auto take = [&](const char* i_pModel, const auto& i_IsNamed)

@@ -1,5 +1,7 @@
 #include "studio/qmltypes/Tessel.h"
 
+#include "math/VisibleText.h"
+
 #include <QFileInfo>
 
 namespace StudioHost
@@ -17,7 +19,12 @@ bool VTessel::execute(const QString& i_rCommand) const
 
 QString VTessel::fileName(const QUrl& i_rUrl)
 {
-	return i_rUrl.fileName();
+	return visible(i_rUrl.fileName());
+}
+
+QString VTessel::visible(const QString& i_rText)
+{
+	return QString::fromStdString(VisibleText::Of(i_rText.toStdString()));
 }
 
 QString VTessel::localPath(const QUrl& i_rUrl)

@@ -21,8 +21,10 @@ public:
 
 	Q_INVOKABLE bool execute(const QString& i_rCommand) const;
 
-	/// What stands behind the last "/", without escapes.
+	/// What stands behind the last "/", without escapes, as it is shown.
 	Q_INVOKABLE static QString fileName(const QUrl& i_rUrl);
+	/// A name as it is shown: what is invisible in it, or turns the direction of writing, stands as its number.
+	Q_INVOKABLE static QString visible(const QString& i_rText);
 	/// The path of a local file's URL, empty for any other.
 	Q_INVOKABLE static QString localPath(const QUrl& i_rUrl);
 	/// The URL of a path, empty for an empty one.

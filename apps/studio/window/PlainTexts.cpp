@@ -1,8 +1,12 @@
 #include "studio/window/PlainTexts.h"
 
+#include "math/VisibleText.h"
+
 #include <QApplication>
 #include <QEvent>
+#include <QFileInfo>
 #include <QLabel>
+#include <QStringList>
 #include <QTextDocument>
 
 namespace StudioHost
@@ -21,9 +25,22 @@ bool VPlainTexts::eventFilter(QObject* i_pObject, QEvent* i_pEvent)
 	return false;
 }
 
+QString ShownText(const QString& i_rText)
+{
+	return QString::fromStdString(VisibleText::Of(i_rText.toStdString()));
+}
+
+QString ShownFileName(const QString& i_rPath)
+{
+	return ShownText(QFileInfo(i_rPath).fileName());
+}
+
 QString PlainToolTip(const QString& i_rText)
 {
-	return i_rText.isEmpty() ? i_rText : Qt::convertFromPlainText(i_rText);
+	QStringList lines = i_rText.split('\n');
+	for (QString& rLine : lines)
+		rLine = ShownText(rLine);
+	return i_rText.isEmpty() ? i_rText : Qt::convertFromPlainText(lines.join('\n'));
 }
 
 } // namespace StudioHost

@@ -17,6 +17,12 @@ public:
 	bool eventFilter(QObject* i_pObject, QEvent* i_pEvent) override;
 };
 
+/// A name, a path or a sentence with such in it as a widget shows it: what is invisible in it, or turns the direction
+/// of writing, stands as its number. What goes back as a name or a path must not come from here.
+QString ShownText(const QString& i_rText);
+/// Of a path.
+QString ShownFileName(const QString& i_rPath);
+
 /// What a widget is to be given as its tool tip, which has no such choice, so that it shows this text.
 QString PlainToolTip(const QString& i_rText);
 

@@ -234,7 +234,7 @@ void VProposeDialog::ListPresets()
 	if (!m_PresetFolder.isEmpty())
 		for (const QFileInfo& rFile :
 		    QDir(m_PresetFolder).entryInfoList({QStringLiteral("*.json")}, QDir::Files, QDir::Name))
-			m_pOrigin->addItem(rFile.completeBaseName(), rFile.absoluteFilePath());
+			m_pOrigin->addItem(ShownText(rFile.completeBaseName()), rFile.absoluteFilePath());
 	m_pOrigin->addItem(tr("Another preset..."));
 }
 
@@ -245,7 +245,7 @@ void VProposeDialog::ChooseOrigin()
 		const QString file =
 		    QFileDialog::getOpenFileName(this, tr("Choose a file"), m_PresetFolder, tr("Presets (*.json)"));
 		if (!file.isEmpty())
-			m_pOrigin->insertItem(m_pOrigin->count() - 1, QFileInfo(file).completeBaseName(), file);
+			m_pOrigin->insertItem(m_pOrigin->count() - 1, ShownText(QFileInfo(file).completeBaseName()), file);
 		m_pOrigin->setCurrentIndex(file.isEmpty() ? m_Origin : m_pOrigin->count() - 2);
 	}
 	m_Origin = m_pOrigin->currentIndex();

@@ -2,6 +2,7 @@
 
 #include "OrlexGraphics/skins/SkinCache.h"
 #include "studio/window/Named.h"
+#include "studio/window/PlainTexts.h"
 
 #include <QHBoxLayout>
 #include <QLabel>
@@ -53,7 +54,7 @@ void VSkinProgress::Refresh()
 {
 	QStringList names;
 	for (const std::string& rName : m_pSkinCache->Loading())
-		names << QString::fromStdString(rName);
+		names << ShownText(QString::fromStdString(rName));
 	m_pText->setText(names.isEmpty() ? QString() : tr("Loading skin %1").arg(names.join(", ")));
 	m_pBar->setVisible(!names.isEmpty());
 	adjustSize();

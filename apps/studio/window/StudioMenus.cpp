@@ -14,6 +14,7 @@
 #include "studio/window/AlignDialog.h"
 #include "studio/window/EditKeys.h"
 #include "studio/window/Named.h"
+#include "studio/window/PlainTexts.h"
 #include "studio/window/PreferencesDialog.h"
 #include "studio/window/ProposeDialog.h"
 #include "studio/window/RebindDialog.h"
@@ -47,9 +48,9 @@ namespace
 {
 
 /// For a menu, where a "&" in a name is no mnemonic.
-QString Verbatim(QString i_Text)
+QString Verbatim(const QString& i_rText)
 {
-	return i_Text.replace('&', "&&");
+	return ShownText(i_rText).replace('&', "&&");
 }
 
 struct VOpenRow
@@ -395,7 +396,7 @@ QString VStudioWindow::AskWhereToSave(const QString& i_rFolder, const QString& i
 			file += i_rExtension;
 		if (file.isEmpty() || !QFileInfo::exists(file)
 		    || QMessageBox::warning(this, tr("Save As"),
-		           tr("%1 is there already. Do you want to replace it?").arg(QFileInfo(file).fileName()),
+		           tr("%1 is there already. Do you want to replace it?").arg(ShownFileName(file)),
 		           QMessageBox::Yes | QMessageBox::No, QMessageBox::No)
 		        == QMessageBox::Yes)
 			return file;

@@ -6,6 +6,7 @@
 #include "studio/motion/TakePlayer.h"
 #include "studio/panel/FileKind.h"
 #include "studio/panel/RetargetPanel.h"
+#include "studio/window/PlainTexts.h"
 #include "studio/window/ReportRun.h"
 #include "studio/window/ReviewDialog.h"
 #include "studio/window/StudioWindow.h"
@@ -59,7 +60,7 @@ void VStudioWindow::CompareWithSaved()
 
 void VStudioWindow::CompareWith(const QString& i_rPath)
 {
-	ShowReview({"Compare", tr("Compare with %1").arg(QFileInfo(i_rPath).fileName()), {tr("What differs")}, 0,
+	ShowReview({"Compare", tr("Compare with %1").arg(ShownFileName(i_rPath)), {tr("What differs")}, 0,
 	    [this, i_rPath](VReviewDialog& io_rShown)
 	    { return ShowIn(io_rShown, m_pRetargetPanel->CompareWith(i_rPath)); }});
 }

@@ -199,7 +199,8 @@ void VStudioWindow::OfferLeftWork()
 		return;
 	for (const VUnsavedWork& rWork : m_pWorkKeeper->Left())
 	{
-		const QString file = rWork.m_File.isEmpty() ? tr("a retarget subject that was in no file yet") : rWork.m_File;
+		const QString file =
+		    rWork.m_File.isEmpty() ? tr("a retarget subject that was in no file yet") : ShownText(rWork.m_File);
 		QMessageBox box(QMessageBox::Question, c_Title,
 		    tr("Retarget Studio did not end cleanly, and work was not saved: %1").arg(file),
 		    QMessageBox::Open | QMessageBox::Discard | QMessageBox::Cancel, this);
@@ -207,9 +208,9 @@ void VStudioWindow::OfferLeftWork()
 		                      .arg(rWork.m_Targets)
 		                      .arg(QLocale().toString(rWork.m_Time.toLocalTime(), QLocale::ShortFormat))};
 		if (!rWork.m_Source.isEmpty())
-			lines << tr("Performer: %1").arg(rWork.m_Source);
+			lines << tr("Performer: %1").arg(ShownText(rWork.m_Source));
 		if (!rWork.m_Fbx.isEmpty())
-			lines << tr("Character: %1").arg(rWork.m_Fbx);
+			lines << tr("Character: %1").arg(ShownText(rWork.m_Fbx));
 		box.setInformativeText(lines.join('\n'));
 		Named(&box, "LeftWork", box.text());
 		box.button(QMessageBox::Open)->setText(tr("&Take It Up Again"));
@@ -266,7 +267,7 @@ bool VStudioWindow::MayLoseChanges(const QString& i_rAction)
 	m_pRetargetPanel->ApplyTyped();
 	if (!m_pRetargetPanel->HasUnsavedChanges())
 		return true;
-	const QString file = QFileInfo(m_pRetargetPanel->CurrentFile()).fileName();
+	const QString file = ShownFileName(m_pRetargetPanel->CurrentFile());
 	QMessageBox box(QMessageBox::Warning, c_Title,
 	    (file.isEmpty() ? tr("The retarget subject has changes that are in no file.")
 	                    : tr("%1 has changes that are not saved.").arg(file)),
@@ -307,7 +308,7 @@ void VStudioWindow::ShowSaveFailure(const QString& i_rReason)
 void VStudioWindow::UpdateTitle()
 {
 	const bool bUnsaved = m_pRetargetPanel && m_pRetargetPanel->HasUnsavedChanges();
-	QString file = m_pRetargetPanel ? QFileInfo(m_pRetargetPanel->CurrentFile()).fileName() : QString();
+	QString file = m_pRetargetPanel ? ShownFileName(m_pRetargetPanel->CurrentFile()) : QString();
 	if (file.isEmpty() && bUnsaved)
 		file = tr("New retarget subject");
 	// Where the mark stands; in a name it is no mark.
@@ -320,7 +321,7 @@ bool VStudioWindow::MayOverwrite(const std::string& i_rPath)
 {
 	QMessageBox box(QMessageBox::Warning, windowTitle(),
 	    tr("%1 was changed by another program since it was last loaded or saved here. Overwrite it?")
-	        .arg(QString::fromStdString(i_rPath)),
+	        .arg(ShownText(QString::fromStdString(i_rPath))),
 	    QMessageBox::Save | QMessageBox::Cancel, this);
 	Named(&box, "ChangedFile", box.text());
 	box.button(QMessageBox::Save)->setText(tr("&Overwrite"));

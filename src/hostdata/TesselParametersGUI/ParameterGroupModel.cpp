@@ -3,6 +3,7 @@
 #include "TesselDataStore/StoredValue.h"
 #include "TesselPluginInterface/IParameterGroup.h"
 #include "TesselPluginInterface/IParameterRegistry.h"
+#include "math/VisibleText.h"
 
 #include <QPointer>
 #include <QStringList>
@@ -204,7 +205,7 @@ void VParameterGroupModel::Read(const IParameter& i_rParameter, VRow& o_rRow)
 	QStringList texts;
 	for (const VEnumEntry& rEntry : o_rRow.m_Enumeration)
 	{
-		names.push_back(text(rEntry.m_Name));
+		names.push_back(text(VisibleText::Of(rEntry.m_Name)));
 		texts.push_back(text(i_rParameter.ToText(rEntry.m_Value)));
 	}
 	const auto current = std::find_if(o_rRow.m_Enumeration.begin(), o_rRow.m_Enumeration.end(),

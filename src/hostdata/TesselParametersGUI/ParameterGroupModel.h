@@ -53,7 +53,7 @@ public:
 		MaximumRole,
 		/// bool: only some values are permitted, even if there is none to choose now.
 		EnumeratedRole,
-		/// QStringList; the texts are those of the values.
+		/// QStringList: the names as they are shown, and the texts of the values.
 		EnumNamesRole,
 		EnumTextsRole,
 		/// -1 for a value that is not in the list.

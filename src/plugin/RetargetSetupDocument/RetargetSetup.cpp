@@ -4,6 +4,7 @@
 #include "NVX/Status.h"
 #include "RetargetSetupCore/Identity.h"
 #include "RetargetSetupCore/IgnoredCommands.h"
+#include "RetargetSetupDocument/ShownText.h"
 #include "UtilsFileSystem/Paths.h"
 
 #include <QString>
@@ -34,7 +35,12 @@ void VRetargetSetup::Published()
 
 void VRetargetSetup::CommandIgnored(const char* i_pCommand, const std::string& i_rReason)
 {
-	emit commandIgnored(i_pCommand, QString::fromStdString(i_rReason));
+	emit commandIgnored(i_pCommand, QString::fromStdString(VisibleText::OnOneLine(i_rReason)));
+}
+
+QString VRetargetSetup::PoseNote() const
+{
+	return RetargetSetup::ShownText(VRetargetSetupCore::PoseNote());
 }
 
 void VRetargetSetup::TargetSubjectBroughtBack(const boost::filesystem::path& i_rFile)

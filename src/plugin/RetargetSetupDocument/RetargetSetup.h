@@ -135,7 +135,7 @@ public:
 	/// @return false, with the reason told by commandIgnored, if it could not be read.
 	Q_INVOKABLE bool RestoreTargetSubjectURL(const QUrl& i_rCopyURL, const QUrl& i_rFileURL);
 
-	QString PoseNote() const { return QString::fromStdString(VRetargetSetupCore::PoseNote()); }
+	QString PoseNote() const;
 
 	std::shared_ptr<VRetargetSetupSegmentModel> GetSourceSegmentModel() const { return m_pSourceSegmentModel; }
 	std::shared_ptr<VRetargetSetupSegmentModel> GetTargetSegmentModel() const { return m_pTargetSegmentModel; }

@@ -2,6 +2,7 @@
 
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/ShownText.h"
 #include "SetupReview/rebind/RebindDocument.h"
 
 #include <QStringList>
@@ -18,7 +19,7 @@ QStringList ToStrings(const std::vector<std::string>& i_rTexts)
 {
 	QStringList list;
 	for (const std::string& rText : i_rTexts)
-		list << QString::fromStdString(rText);
+		list << RetargetSetup::ShownText(rText);
 	return list;
 }
 
@@ -37,7 +38,7 @@ QVariantMap VRetargetSetup::LookAtRebind(bool i_bPerformer) const
 	if (!rebound)
 		return {};
 	if (!rebound->m_Refusal.empty())
-		return {{"refusal", QString::fromStdString(rebound->m_Refusal)}};
+		return {{"refusal", RetargetSetup::ShownText(rebound->m_Refusal)}};
 	QStringList renamed;
 	int kept = 0;
 	for (const SetupReview::VRebindMatch& rMatch : rebound->m_Matches)
@@ -45,11 +46,11 @@ QVariantMap VRetargetSetup::LookAtRebind(bool i_bPerformer) const
 			++kept;
 		else if (rMatch.m_Rule != ERebindRule::None)
 			renamed << QStringLiteral("%1 is %2, %3")
-			               .arg(QString::fromStdString(rMatch.m_Old), QString::fromStdString(rMatch.m_New),
+			               .arg(RetargetSetup::ShownText(rMatch.m_Old), RetargetSetup::ShownText(rMatch.m_New),
 			                   RuleText(rMatch));
 	QStringList changed;
 	for (const SetupReview::VSetupChange& rChange : rebound->m_Changes)
-		changed << QString::fromStdString(SetupReview::ChangeLine(rChange));
+		changed << RetargetSetup::ShownText(SetupReview::ChangeLine(rChange));
 	const QStringList lost = ToStrings(rebound->m_Lost);
 	const QStringList added = ToStrings(rebound->m_Added);
 	if (renamed.isEmpty() && changed.isEmpty() && lost.isEmpty() && added.isEmpty())

@@ -3,6 +3,7 @@
 #include "RetargetSetupCore/IgnoredCommands.h"
 #include "RetargetSetupCore/RestSkeletons.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/ShownText.h"
 #include "SetupProposal/PoseCheck.h"
 #include "SetupReview/advice/Advice.h"
 #include "SetupReview/compare/CompareDocument.h"
@@ -28,11 +29,11 @@ QVariantMap AdviceOn(const VRetargetSetupCore::VSubjectValues& i_rSource,
 	QVariantList rows;
 	for (const SetupReview::VPruneAdvice& rAdvice : advice->m_Prune)
 	{
-		const QString joint = QString::fromStdString(i_rTarget.m_pParametrised->m_Segments[rAdvice.m_Segment].m_Name);
+		const QString joint = RetargetSetup::ShownText(i_rTarget.m_pParametrised->m_Segments[rAdvice.m_Segment].m_Name);
 		QVariantMap row =
 		    Row({joint, SetupReview::NameOf(rAdvice.m_Verdict),
-		            QString::fromStdString(SetupReview::PoseChangeText(rAdvice, *i_rTarget.m_pParametrised)),
-		            QString::fromStdString(rAdvice.m_Words)},
+		            RetargetSetup::ShownText(SetupReview::PoseChangeText(rAdvice, *i_rTarget.m_pParametrised)),
+		            RetargetSetup::ShownText(rAdvice.m_Words)},
 		        '"' + joint + '"');
 		row["joint"] = int(rAdvice.m_Segment);
 		rows << row;
@@ -46,14 +47,14 @@ QVariantMap AdviceOn(const VRetargetSetupCore::VSubjectValues& i_rSource,
 		    {"rows", rows}};
 	for (const SetupReview::VRangeConflict& rConflict : advice->m_Range->m_Conflicts)
 	{
-		const QString missed = "target " + QString::fromStdString(rConflict.m_TargetName);
-		rows << Row(
-		    {missed, QStringLiteral("is pulled"), {},
-		        QString("target %1 pulls against it: it %2")
-		            .arg(QString::fromStdString(rConflict.m_AgainstName), QString::fromStdString(rConflict.m_Words))},
+		const QString missed = "target " + RetargetSetup::ShownText(rConflict.m_TargetName);
+		rows << Row({missed, QStringLiteral("is pulled"), {},
+		                QString("target %1 pulls against it: it %2")
+		                    .arg(RetargetSetup::ShownText(rConflict.m_AgainstName),
+		                        RetargetSetup::ShownText(rConflict.m_Words))},
 		    missed);
 	}
-	return {{"summary", summary + ' ' + QString::fromStdString(SetupReview::RangeSummary(*advice->m_Range)) + '.'},
+	return {{"summary", summary + ' ' + RetargetSetup::ShownText(SetupReview::RangeSummary(*advice->m_Range)) + '.'},
 	    {"rows", rows}};
 }
 
@@ -75,7 +76,7 @@ QVariantMap VRetargetSetup::CompareWith(const QUrl& i_rFileURL)
 	QVariantList rows;
 	for (const SetupReview::VSetupChange& rChange : *changes)
 	{
-		const QString line = QString::fromStdString(SetupReview::ChangeLine(rChange));
+		const QString line = RetargetSetup::ShownText(SetupReview::ChangeLine(rChange));
 		rows << Row({line}, line);
 	}
 	return {{"summary",
@@ -139,15 +140,15 @@ QVariantMap VRetargetSetup::CheckPose()
 	int toMend = 0;
 	for (const SetupProposal::VPoseFinding& rFinding : PoseFindings(*proposal))
 	{
-		const QString message = QString::fromStdString(rFinding.m_Message);
-		const QString options = QString::fromStdString(rFinding.m_Options);
+		const QString message = RetargetSetup::ShownText(rFinding.m_Message);
+		const QString options = RetargetSetup::ShownText(rFinding.m_Options);
 		rows << Row({rFinding.m_pId, rFinding.m_bFine ? QStringLiteral("fine") : QStringLiteral("look"), message,
 		                options.isEmpty() ? QString()
 		                                  : QString("\"Align to Source...\", or retarget edit with %1").arg(options)},
 		    message);
 		toMend += !rFinding.m_bFine;
 	}
-	const QString summary = rows.isEmpty() ? QString::fromStdString(proposal->m_NoBody)
+	const QString summary = rows.isEmpty() ? RetargetSetup::ShownText(proposal->m_NoBody)
 	    : toMend == 0                      ? QStringLiteral("Both stand alike.")
 	                                       : QString("To be looked at: %1 of %2.").arg(toMend).arg(rows.size());
 	return {{"summary", summary.isEmpty() ? QStringLiteral("There is no pair to compare the two by.") : summary},

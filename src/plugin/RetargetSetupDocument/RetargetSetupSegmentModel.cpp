@@ -2,6 +2,7 @@
 
 #include "NVX/SelectionItemVariant.h"
 #include "RetargetSetupDocument/RoleNames.h"
+#include "RetargetSetupDocument/ShownText.h"
 
 #include <QtQml>
 
@@ -45,7 +46,7 @@ QVariant VRetargetSetupSegmentModel::data(const QModelIndex& i_rIndex, int i_Rol
 		return {};
 	switch (i_Role)
 	{
-	case Name: return QString::fromStdString(m_pSubject->m_Segments[std::size_t(i_rIndex.row())].m_Name);
+	case Name: return RetargetSetup::ShownText(m_pSubject->m_Segments[std::size_t(i_rIndex.row())].m_Name);
 	case SelectionItem:
 		return QVariant::fromValue(NVX::ISelectionItem{
 		    m_Flavour == EFlavour::ETarget ? NVX::ESelectionTargetSegment : NVX::ESelectionSourceSegment,

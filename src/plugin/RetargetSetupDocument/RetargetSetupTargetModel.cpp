@@ -3,6 +3,7 @@
 #include "NVX/SelectionItemVariant.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupDocument/RoleNames.h"
+#include "RetargetSetupDocument/ShownText.h"
 
 #include <QtQml>
 
@@ -16,7 +17,7 @@ namespace
 
 QVariant TextOrNothing(const std::string* i_pText)
 {
-	return i_pText ? QVariant(QString::fromStdString(*i_pText)) : QVariant();
+	return i_pText ? QVariant(RetargetSetup::ShownText(*i_pText)) : QVariant();
 }
 
 } // namespace

@@ -4,6 +4,7 @@
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/StepNames.h"
 #include "RetargetSetupDocument/RetargetSetup.h"
+#include "RetargetSetupDocument/ShownText.h"
 #include "SetupProposal/PoseCheck.h"
 
 #include <QStringList>
@@ -27,7 +28,7 @@ QVariantMap ToMap(const SetupProposal::VProposedPair& i_rPair, const VBoth& i_rB
 {
 	QStringList reasons;
 	for (const std::string& rReason : i_rPair.m_Reasons)
-		reasons << QString::fromStdString(rReason);
+		reasons << RetargetSetup::ShownText(rReason);
 	const auto isThere = [&](bool i_bPosition)
 	{
 		return RetargetSetup::FindTargetPair(i_rBoth.m_rTarget, i_rBoth.m_rSource.m_Segments[i_rPair.m_Source].m_Name,
@@ -80,13 +81,13 @@ QVariantMap VRetargetSetup::ProposeTargets(double i_LeastScore)
 	QVariantList unmapped;
 	for (const SetupProposal::VUnmapped& rUnmapped : proposal->m_UnmappedSources)
 		unmapped << QVariantMap{
-		    {"source", int(rUnmapped.m_Joint)}, {"reason", QString::fromStdString(rUnmapped.m_Reason)}};
+		    {"source", int(rUnmapped.m_Joint)}, {"reason", RetargetSetup::ShownText(rUnmapped.m_Reason)}};
 	QStringList findings;
 	for (const SetupProposal::VPoseFinding& rFinding : PoseFindings(*proposal))
 		if (!rFinding.m_bFine)
-			findings << QString::fromStdString(rFinding.m_Message);
+			findings << RetargetSetup::ShownText(rFinding.m_Message);
 	return {{"pairs", ToList(proposal->m_Pairs, both)}, {"alternatives", ToList(proposal->m_Alternatives, both)},
-	    {"unmapped", unmapped}, {"findings", findings}, {"noBody", QString::fromStdString(proposal->m_NoBody)}};
+	    {"unmapped", unmapped}, {"findings", findings}, {"noBody", RetargetSetup::ShownText(proposal->m_NoBody)}};
 }
 
 QVariantMap VRetargetSetup::FitPreset(const QUrl& i_rFileURL, double i_LeastScore)
@@ -121,8 +122,9 @@ QVariantMap VRetargetSetup::FitPreset(const QUrl& i_rFileURL, double i_LeastScor
 	QStringList misfits;
 	for (const RetargetSetup::VMisfit& rMisfit : fit.m_Misfits)
 		misfits << QStringLiteral("\"%1\" and \"%2\": %3")
-		               .arg(QString::fromStdString(rMisfit.m_Pair.m_Source),
-		                   QString::fromStdString(rMisfit.m_Pair.m_Target), QString::fromStdString(rMisfit.m_Reason));
+		               .arg(RetargetSetup::ShownText(rMisfit.m_Pair.m_Source),
+		                   RetargetSetup::ShownText(rMisfit.m_Pair.m_Target),
+		                   RetargetSetup::ShownText(rMisfit.m_Reason));
 	return {{"pairs", fitted},
 	    {"alternatives", ToList(proposal->m_Pairs, both) + ToList(proposal->m_Alternatives, both)},
 	    {"unmapped", unmapped}, {"misfits", misfits}};
@@ -190,17 +192,17 @@ QVariantMap VRetargetSetup::AlignToSource(
 	QVariantList joints;
 	for (const SetupProposal::VAlignedJoint& rJoint : rAlignment.m_Joints)
 		joints << QVariantMap{{"target", int(rJoint.m_Target)}, {"source", int(rJoint.m_Source)},
-		    {"before", rJoint.m_Before}, {"after", rJoint.m_After}, {"note", QString::fromStdString(rJoint.m_Note)}};
+		    {"before", rJoint.m_Before}, {"after", rJoint.m_After}, {"note", RetargetSetup::ShownText(rJoint.m_Note)}};
 	QVariantList refused;
 	for (const SetupProposal::VRefusedChain& rChain : rAlignment.m_Refused)
 		refused << QString("The %1 stays as it is: %2")
-		               .arg(QString::fromStdString(rChain.m_Chain), QString::fromStdString(rChain.m_Reason));
+		               .arg(RetargetSetup::ShownText(rChain.m_Chain), RetargetSetup::ShownText(rChain.m_Reason));
 	const Rotation::VVector3& rMove = rAlignment.m_MoveMm;
 	const bool bToFit = aligned->m_Scale && !aligned->m_Scale->m_bFine;
 	return {{"joints", joints}, {"refused", refused}, {"turn", rAlignment.m_TurnDegrees},
 	    {"move", std::hypot(rMove[0], rMove[1])}, {"lift", rMove[2]}, {"scaled", aligned->m_bScaled},
 	    {"scale", bToFit ? SetupProposal::SuggestedScale(*aligned->m_Scale) : 1.0},
-	    {"heights", aligned->m_Scale ? QString::fromStdString(aligned->m_Scale->m_Message) : QString()}};
+	    {"heights", aligned->m_Scale ? RetargetSetup::ShownText(aligned->m_Scale->m_Message) : QString()}};
 }
 
 void VRetargetSetup::EndAlignment(bool i_bKeep)

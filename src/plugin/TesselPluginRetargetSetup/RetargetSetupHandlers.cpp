@@ -18,6 +18,7 @@
 #include "TesselPluginRetargetSetup/BoneList.h"
 #include "TesselPluginRetargetSetup/RetargetSetupWidget.h"
 #include "UtilsFileSystem/Paths.h"
+#include "math/VisibleText.h"
 
 #include <algorithm>
 #include <bit>
@@ -298,7 +299,8 @@ void VRetargetSetupWidget::OnSetupChanged()
 void VRetargetSetupWidget::UpdateRemarks()
 {
 	QStringList remarks;
-	const auto text = [](const std::string& i_rText) { return QString::fromStdString(i_rText); };
+	const auto text = [](const std::string& i_rText)
+	{ return QString::fromStdString(VisibleText::OnOneLine(i_rText)); };
 	if (!m_UnreadSource.empty())
 	{
 		const QString shown = text(m_pRetargetSetup->GetShownSourceName());

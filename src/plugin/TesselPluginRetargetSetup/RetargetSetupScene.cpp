@@ -10,6 +10,7 @@
 #include "RetargetSetupCore/RetargetSetupCore.h"
 #include "RetargetSetupCore/RetargetTargets.h"
 #include "RetargetSetupCore/StepNames.h"
+#include "RetargetSetupDocument/ShownText.h"
 #include "RetargetSetupDocument/StaleSelection.h"
 #include "SetupProposal/Side.h"
 #include "TesselPluginInterface/ISelectionManager.h"
@@ -130,7 +131,7 @@ QVariantList VRetargetSetupScene::PointedAt() const
 		if (RetargetSetup::IsOfDocument(rItem))
 			things << QVariantMap{{"kind", rItem.m_Kind}, {"index", rItem.m_ElementIndex},
 			    {"subject",
-			        QString::fromStdString(rItem.m_Kind == NVX::ESelectionSourceSegment
+			        RetargetSetup::ShownText(rItem.m_Kind == NVX::ESelectionSourceSegment
 			                ? m_pRetargetSetup->GetShownSourceName()
 			                : pData ? pData->m_Skin
 			                        : "")}};

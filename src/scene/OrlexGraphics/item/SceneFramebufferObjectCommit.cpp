@@ -4,6 +4,7 @@
 #include "OrlexGraphics/picking/Picking.h"
 #include "OrlexGraphics/picking/SelectionKinds.h"
 #include "TesselPluginInterface/ISelectionManager.h"
+#include "math/VisibleText.h"
 
 #include <algorithm>
 
@@ -72,7 +73,7 @@ void VSceneFramebufferObject::PreviewPick(const VPick& i_rPick)
 	VItems items = PreselectionOf(i_rPick.m_Items, rpManager->Selection().Items(), m_ModifierState);
 	const bool bNumbers = std::any_of(i_rPick.m_Items.begin(), i_rPick.m_Items.end(),
 	    [](const NVX::ISelectionItem& i_rItem) { return i_rItem.m_Kind == ESelectionCamera; });
-	QString toolTip = QString::fromStdString(ToolTip(i_rPick.m_Names));
+	QString toolTip = QString::fromStdString(VisibleText::OnOneLine(ToolTip(i_rPick.m_Names)));
 	const bool bItems = items != rpManager->PreSelection().Items();
 	const QPoint place = i_rPick.m_Request.m_Mouse;
 	if (!bItems && toolTip == m_ToolTipText && bNumbers == m_bShowCameraNumbers)

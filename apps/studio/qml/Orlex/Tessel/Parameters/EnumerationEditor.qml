@@ -1,6 +1,7 @@
 import QtQuick 2.15
 import Orlex.Controls 1.0
 import Orlex.Theme 1.0
+import TesselQML 1.0
 
 // One of the permitted values. A value that is none of them (a file may bring one) is shown as it is, in the colour of
 // a warning.
@@ -27,7 +28,7 @@ Item {
 		model: editor.row ? editor.row.enumNames : []
 		// A pick may load a file.
 		steps: false
-		displayText: currentIndex >= 0 ? currentText : editor.foreign ? editor.row.valueText : ""
+		displayText: currentIndex >= 0 ? currentText : editor.foreign ? Tessel.visible(editor.row.valueText) : ""
 		placeholderText: count > 0 ? "Not set" : "Nothing to choose from"
 		textColor: editor.foreign ? Theme.warning : Theme.text
 		toolTip: editor.foreign ? "This value is not in the list" : count === 0 && editor.row && editor.row.hint.none || ""

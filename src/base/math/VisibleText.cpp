@@ -1,10 +1,10 @@
-#include "CommandLineText/VisibleText.h"
+#include "math/VisibleText.h"
 
 #include <algorithm>
 #include <array>
 #include <cstdint>
 
-namespace CommandLine
+namespace VisibleText
 {
 namespace
 {
@@ -94,19 +94,19 @@ std::string InBrackets(std::uint32_t i_Value, bool i_bCharacter)
 
 } // namespace
 
-std::string VisibleText(std::string_view i_Text)
+std::string Of(std::string_view i_Text)
 {
 	return Replaced(i_Text, InBrackets);
 }
 
-std::string VisibleLine(std::string_view i_Text)
+std::string OnOneLine(std::string_view i_Text)
 {
 	return Replaced(i_Text,
 	    [](std::uint32_t i_Value, bool i_bCharacter)
 	    { return i_bCharacter && i_Value < 0x80 ? " " : InBrackets(i_Value, i_bCharacter); });
 }
 
-std::string VisibleJson(std::string_view i_Json)
+std::string InJson(std::string_view i_Json)
 {
 	return Replaced(i_Json,
 	    [](std::uint32_t i_Value, bool i_bCharacter)
@@ -121,4 +121,4 @@ std::string VisibleJson(std::string_view i_Json)
 	    });
 }
 
-} // namespace CommandLine
+} // namespace VisibleText
