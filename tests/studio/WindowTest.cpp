@@ -440,6 +440,21 @@ TEST_F(Window, OffersWhatACrashHasLeft)
 	QMetaObject::invokeMethod(&Document(), "RemoveUnnecessaryJoints");
 	m_pWindow->WorkKeeper()->Keep();
 	EXPECT_TRUE(m_pWindow->WorkKeeper()->Left().empty()) << "it is this program's own";
+	// Whoever removes the lock does not get the work of a program that runs, nor does the whole folder stay away.
+	static QString s_QtSaid;
+	qInstallMessageHandler([](QtMsgType, const QMessageLogContext&, const QString& i_rText) { s_QtSaid += i_rText; });
+	for (const bool bFolder : {false, true})
+	{
+		for (const QString& rName : content())
+			if (bFolder || rName.endsWith(".lock"))
+				QFile::remove(folder + '/' + rName);
+		EXPECT_EQ(QDir().rmdir(folder), bFolder);
+		m_pWindow->WorkKeeper()->Keep();
+		EXPECT_EQ(content().filter(".lock").size(), 1);
+		EXPECT_TRUE(StudioHost::VUnsavedWorkFolder(folder).Left().empty()) << "another program asks";
+	}
+	qInstallMessageHandler(nullptr);
+	EXPECT_FALSE(s_QtSaid.contains("lock")) << s_QtSaid.toStdString();
 	// The process is gone, its files are not.
 	std::map<QString, QByteArray> left;
 	for (const QString& rName : content())

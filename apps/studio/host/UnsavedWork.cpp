@@ -31,6 +31,13 @@ QByteArray PrintNote(const VUnsavedWork& i_rWork)
 	    .toJson();
 }
 
+/// What the files of one program have in common.
+QString StemOf(const QString& i_rPath)
+{
+	const QFileInfo file(i_rPath);
+	return file.dir().filePath(file.fileName().section('.', 0, 0));
+}
+
 /// @return false for a note that is none, or whose copy is gone.
 bool ReadNote(const QFileInfo& i_rNote, VUnsavedWork& o_rWork)
 {
@@ -45,7 +52,9 @@ bool ReadNote(const QFileInfo& i_rNote, VUnsavedWork& o_rWork)
 	o_rWork.m_Fbx = note["fbx"].toString();
 	o_rWork.m_Time = QDateTime::fromString(note["time"].toString(), Qt::ISODateWithMs);
 	o_rWork.m_Targets = note["targets"].toInt();
-	return o_rWork.m_Time.isValid() && QFileInfo(o_rWork.m_Copy).isFile();
+	// A note tells of the copies of its own program; others may be of one that runs.
+	return o_rWork.m_Time.isValid() && StemOf(o_rWork.m_Copy) == StemOf(i_rNote.filePath())
+	    && QFileInfo(o_rWork.m_Copy).isFile();
 }
 
 std::unique_ptr<QLockFile> MakeLock(const QString& i_rPath)
@@ -62,13 +71,6 @@ void RemoveAll(const QString& i_rStem)
 	QFile::remove(i_rStem + c_NoteEnding);
 	for (const QString& rEnding : c_CopyEndings)
 		QFile::remove(i_rStem + rEnding);
-}
-
-/// What the files of one program have in common.
-QString StemOf(const QString& i_rPath)
-{
-	const QFileInfo file(i_rPath);
-	return file.dir().filePath(file.fileName().section('.', 0, 0));
 }
 
 } // namespace
@@ -88,8 +90,26 @@ QString VUnsavedWorkFolder::Path(const QString& i_rEnding) const
 	return QDir(m_Folder).filePath(m_Name + i_rEnding);
 }
 
+bool VUnsavedWorkFolder::IsLockThere() const
+{
+	return QFileInfo::exists(Path(c_LockEnding));
+}
+
+void VUnsavedWorkFolder::Unlock()
+{
+	// Else Qt would complain that it cannot remove what somebody else has removed.
+	if (!IsLockThere())
+	{
+		QDir().mkdir(m_Folder);
+		QFile(Path(c_LockEnding)).open(QIODevice::WriteOnly);
+	}
+	m_pLock.reset();
+}
+
 QString VUnsavedWorkFolder::NextCopy()
 {
+	if (m_pLock && !IsLockThere())
+		Unlock();
 	if (!m_pLock)
 	{
 		if (!QDir().mkpath(m_Folder))
@@ -119,7 +139,7 @@ void VUnsavedWorkFolder::Drop()
 	if (!m_pLock)
 		return;
 	RemoveAll(Path({}));
-	m_pLock.reset();
+	Unlock();
 	// Only if nobody else keeps anything.
 	QDir().rmdir(m_Folder);
 }

@@ -38,8 +38,9 @@ public:
 	VUnsavedWorkFolder(const VUnsavedWorkFolder&) = delete;
 	VUnsavedWorkFolder& operator=(const VUnsavedWorkFolder&) = delete;
 
-	/// Where the next copy is to be written, one of two in turn so that the last one stays whole until Keep is done;
-	/// empty if the folder cannot be made or written to.
+	/// Makes folder and lock, again if somebody took them away: without its lock the copy would be anybody's.
+	/// @return where the next copy is to be written, one of two in turn so that the last one stays whole until Keep is
+	/// done; empty if the folder cannot be made or written to.
 	QString NextCopy();
 
 	/// That copy is written: it counts from now on.
@@ -60,6 +61,8 @@ public:
 
 private:
 	QString Path(const QString& i_rEnding) const;
+	bool IsLockThere() const;
+	void Unlock();
 
 	const QString m_Folder;
 	const QString m_Name;
