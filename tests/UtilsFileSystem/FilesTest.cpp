@@ -9,6 +9,7 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
+#include <sys/stat.h>
 
 namespace
 {
@@ -28,11 +29,14 @@ TEST(Files, ReadsWholeFilesWithinALimit)
 		Put(file, std::string(size, 'x'));
 		EXPECT_EQ(ReadWholeFile(file, size, bytes, error), NVX::Status::c_Success) << error;
 		EXPECT_EQ(bytes, std::string(size, 'x'));
+		EXPECT_EQ(ReadRegularFile(file, size, bytes, error), NVX::Status::c_Success) << error;
+		EXPECT_EQ(bytes, std::string(size, 'x'));
 	}
+	auto pRead = ReadWholeFile;
 	const auto refused = [&](const path& i_rPath, std::uint32_t i_Status, const std::string& i_rReason)
 	{
 		bytes = "old";
-		EXPECT_EQ(ReadWholeFile(i_rPath, 199999, bytes, error), i_Status);
+		EXPECT_EQ(pRead(i_rPath, 199999, bytes, error), i_Status);
 		EXPECT_EQ(error, "Could not read '" + i_rPath.native() + "': " + i_rReason);
 		EXPECT_EQ(bytes, "");
 	};
@@ -45,6 +49,14 @@ TEST(Files, ReadsWholeFilesWithinALimit)
 	EXPECT_EQ(ReadWholeFile("/proc/self/status", 100000, bytes, error), NVX::Status::c_Success);
 	EXPECT_EQ(bytes.substr(0, 5), "Name:");
 	EXPECT_EQ(ReadWholeFile("/dev/null", 0, bytes, error), NVX::Status::c_Success);
+	// What only may be a file: nobody ever writes into this pipe.
+	pRead = ReadRegularFile;
+	ASSERT_EQ(::mkfifo((folder / "pipe").c_str(), 0600), 0);
+	refused(folder / "pipe", NVX::Status::c_FileNotOpened, "Invalid argument");
+	refused("/dev/zero", NVX::Status::c_FileNotOpened, "Invalid argument");
+	refused(folder.Path(), NVX::Status::c_FileNotOpened, "Is a directory");
+	refused(folder / "no", NVX::Status::c_FileNotOpened, "No such file or directory");
+	refused(file, NVX::Status::c_Failure, "it is larger than 199999 bytes");
 }
 
 TEST(Files, Removes)

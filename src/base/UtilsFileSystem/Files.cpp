@@ -59,8 +59,12 @@ VFile OpenFile(const path& i_rPath, const char* i_pMode)
 	return OpenFile(i_rPath, i_pMode, error);
 }
 
-std::uint32_t ReadWholeFile(
-    const path& i_rPath, std::size_t i_MaximumBytes, std::string& o_rBytes, std::string& o_rError)
+namespace
+{
+
+/// @param i_OpenError of a file that could not be opened.
+std::uint32_t ReadOpened(const VFile& i_rpFile, int i_OpenError, const path& i_rPath, std::size_t i_MaximumBytes,
+    std::string& o_rBytes, std::string& o_rError)
 {
 	o_rBytes.clear();
 	const auto fail = [&](std::uint32_t i_Status, const std::string& i_rReason)
@@ -69,10 +73,8 @@ std::uint32_t ReadWholeFile(
 		o_rError = "Could not read '" + ToUtf8(i_rPath) + "': " + i_rReason;
 		return i_Status;
 	};
-	int error = 0;
-	const VFile pFile = OpenFile(i_rPath, "rb", error);
-	if (!pFile)
-		return fail(NVX::Status::c_FileNotOpened, RuntimeErrorText(error));
+	if (!i_rpFile)
+		return fail(NVX::Status::c_FileNotOpened, RuntimeErrorText(i_OpenError));
 
 	// The size is a guess only: pipes have none, and a file may grow.
 	error_code sizeError;
@@ -85,17 +87,35 @@ std::uint32_t ReadWholeFile(
 	for (;;)
 	{
 		errno = 0;
-		read += std::fread(o_rBytes.data() + read, 1, o_rBytes.size() - read, pFile.get());
+		read += std::fread(o_rBytes.data() + read, 1, o_rBytes.size() - read, i_rpFile.get());
 		if (read > i_MaximumBytes)
 			return fail(NVX::Status::c_Failure, "it is larger than " + std::to_string(i_MaximumBytes) + " bytes");
 		if (read < o_rBytes.size())
 			break;
 		o_rBytes.resize(std::min(read + std::max(read, c_Step), i_MaximumBytes + 1));
 	}
-	if (std::ferror(pFile.get()))
+	if (std::ferror(i_rpFile.get()))
 		return fail(NVX::Status::c_Failure, RuntimeErrorText(errno));
 	o_rBytes.resize(read);
 	return NVX::Status::c_Success;
+}
+
+} // namespace
+
+std::uint32_t ReadWholeFile(
+    const path& i_rPath, std::size_t i_MaximumBytes, std::string& o_rBytes, std::string& o_rError)
+{
+	int error = 0;
+	const VFile pFile = OpenFile(i_rPath, "rb", error);
+	return ReadOpened(pFile, error, i_rPath, i_MaximumBytes, o_rBytes, o_rError);
+}
+
+std::uint32_t ReadRegularFile(
+    const path& i_rPath, std::size_t i_MaximumBytes, std::string& o_rBytes, std::string& o_rError)
+{
+	int error = 0;
+	const VFile pFile(Platform::OpenRegular(i_rPath, error));
+	return ReadOpened(pFile, error, i_rPath, i_MaximumBytes, o_rBytes, o_rError);
 }
 
 bool RemoveFile(const path& i_rPath)

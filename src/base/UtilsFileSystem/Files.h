@@ -32,6 +32,11 @@ VFile OpenFile(const boost::filesystem::path& i_rPath, const char* i_pMode);
 std::uint32_t ReadWholeFile(
     const boost::filesystem::path& i_rPath, std::size_t i_MaximumBytes, std::string& o_rBytes, std::string& o_rError);
 
+/// The same of a file that somebody else's file names: anything but a regular file is refused, whenever it came to
+/// stand there, without waiting for a pipe's other end. Nothing is logged.
+std::uint32_t ReadRegularFile(
+    const boost::filesystem::path& i_rPath, std::size_t i_MaximumBytes, std::string& o_rBytes, std::string& o_rError);
+
 /// @return true if there is no such file afterwards. Directories are not removed.
 bool RemoveFile(const boost::filesystem::path& i_rPath);
 

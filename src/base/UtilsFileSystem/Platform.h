@@ -32,6 +32,8 @@ boost::filesystem::path::string_type NativePath(const boost::filesystem::path& i
 
 /// @return null with o_rError set. A directory is refused.
 std::FILE* Open(const boost::filesystem::path& i_rPath, const char* i_pMode, int& o_rError);
+/// The same to read, and only what is a regular file when it is open: no pipe is waited for, no device read.
+std::FILE* OpenRegular(const boost::filesystem::path& i_rPath, int& o_rError);
 /// True if the error of an open that just failed on this thread means that another process holds the file.
 bool IsSharingViolation(int i_Error);
 

@@ -265,6 +265,25 @@ std::FILE* Open(const boost::filesystem::path& i_rPath, const char* i_pMode, int
 	return nullptr;
 }
 
+std::FILE* OpenRegular(const boost::filesystem::path& i_rPath, int& o_rError)
+{
+	VDescriptor file(::open(i_rPath.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY));
+	struct stat about = {};
+	if (!file || ::fstat(file.Get(), &about) != 0)
+		o_rError = errno;
+	else if (!S_ISREG(about.st_mode))
+		o_rError = S_ISDIR(about.st_mode) ? EISDIR : EINVAL;
+	else if (std::FILE* const pFile = ::fdopen(file.Get(), "rb"))
+	{
+		file.Release();
+		o_rError = 0;
+		return pFile;
+	}
+	else
+		o_rError = errno;
+	return nullptr;
+}
+
 bool IsSharingViolation(int i_Error)
 {
 	return i_Error == EBUSY || i_Error == ETXTBSY || i_Error == EAGAIN;

@@ -13,6 +13,7 @@
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
+#include <io.h>
 #include <iterator>
 #include <locale>
 #include <utility>
@@ -219,6 +220,17 @@ std::FILE* Open(const boost::filesystem::path& i_rPath, const char* i_pMode, int
 	std::FILE* pFile = nullptr;
 	o_rError = ::_wfopen_s(&pFile, NativePath(i_rPath).c_str(), mode.c_str());
 	return o_rError == 0 ? pFile : nullptr;
+}
+
+std::FILE* OpenRegular(const boost::filesystem::path& i_rPath, int& o_rError)
+{
+	std::FILE* const pFile = Open(i_rPath, "rb", o_rError);
+	const HANDLE handle = pFile ? reinterpret_cast<HANDLE>(::_get_osfhandle(::_fileno(pFile))) : nullptr;
+	if (!pFile || ::GetFileType(handle) == FILE_TYPE_DISK)
+		return pFile;
+	std::fclose(pFile);
+	o_rError = EINVAL;
+	return nullptr;
 }
 
 bool IsSharingViolation(int i_Error)

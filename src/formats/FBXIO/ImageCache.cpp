@@ -5,7 +5,6 @@
 #include "UtilsFileSystem/Paths.h"
 
 #include <boost/algorithm/string/case_conv.hpp>
-#include <boost/filesystem/operations.hpp>
 
 #include <algorithm>
 #include <locale>
@@ -105,12 +104,8 @@ std::shared_ptr<const FBXIO::VPicture> FBXIO::ImageCache::Get(const std::string&
 	const boost::filesystem::path path = UtilsFileSystem::PathFromUtf8(text);
 	std::string bytes;
 	// A file may name a device, whose reading would never end.
-	boost::system::error_code error;
-	if (is_regular_file(path, error))
-	{
-		std::string reason;
-		UtilsFileSystem::ReadWholeFile(path, std::size_t(Limits::c_ImageBytes), bytes, reason);
-	}
+	std::string reason;
+	UtilsFileSystem::ReadRegularFile(path, std::size_t(Limits::c_ImageBytes), bytes, reason);
 	std::string format = UtilsFileSystem::ToUtf8(path.extension());
 	boost::algorithm::to_lower(format, std::locale::classic());
 	return entry->second = Read(std::move(bytes), format.empty() ? format : format.substr(1), i_rPath, m_BytesLeft);
