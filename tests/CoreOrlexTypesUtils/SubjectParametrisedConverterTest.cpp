@@ -6,6 +6,9 @@
 
 #include <gtest/gtest.h>
 
+#include <tuple>
+#include <utility>
+
 namespace
 {
 
@@ -121,6 +124,46 @@ TEST_F(SubjectParametrisedConverter, ABadSegmentExpressionLeavesZeroAndIsTold)
 	    (VTexts{"2 Could not evaluate m_PreTranslation expressions in segment 'Hips'",
 	        "2 Could not evaluate m_PreRotation expressions in segment 'Hips'",
 	        "2 Could not evaluate m_Bounds expressions in segment 'Spine'"}));
+}
+
+/// The same numbers and messages, whatever was edited; the mark shows that what stands as it did is taken over.
+TEST_F(SubjectParametrisedConverter, AnEditedSubjectBecomesWhatItWouldAnew)
+{
+	using VEdit = void (*)(VSubjectParametrised&);
+	const std::tuple<const char*, VEdit, bool> c_Rows[] = {
+	    {"nothing", [](auto&) {}, true},
+	    {"an expression", [](auto& io_rSubject) { io_rSubject.m_Segments[1].m_Bounds[4] = "Arm"; }, true},
+	    {"a parameter", [](auto& io_rSubject) { io_rSubject.m_StaticParameters[0].m_UserValue = 5; }, false},
+	    {"its expression", [](auto& io_rSubject) { io_rSubject.m_StaticParameters[0].m_DefaultExpression = "2"; },
+	        false},
+	    {"a scale", [](auto& io_rSubject) { io_rSubject.m_DynamicParameters[0].m_Value = 3; }, false},
+	    {"a segment less", [](auto& io_rSubject) { io_rSubject.m_Segments.pop_back(); }, false},
+	    {"a segment more", [](auto& io_rSubject) { io_rSubject.m_Segments.emplace_back(); }, true},
+	    {"the order", [](auto& io_rSubject) { std::swap(io_rSubject.m_Segments[0], io_rSubject.m_Segments[1]); },
+	        false},
+	};
+	m_In.m_DynamicParameters.push_back({"Scale", 1.0, 0.0, 2.0, true});
+	m_In.m_Segments[0].m_PreTranslation = {"2*Arm", "Arm-1/3", "1 2 3"};
+	m_In.m_Segments[0].m_PreRotation = {"x", "0.5", "3*Scale"};
+	m_In.m_Segments[1].m_Bounds = {"1", "2*Scale", "Arm", "0", "4", "5"};
+	VSubject before;
+	ConvertSubject(m_In, before);
+	for (const auto& [pName, edit, bTakenOver] : c_Rows)
+	{
+		VSubjectParametrised edited = m_In;
+		edit(edited);
+		VSubject expected;
+		m_Log.Take();
+		const bool bExpected = ConvertSubject(edited, expected);
+		const VTexts messages = m_Log.Take();
+		EXPECT_EQ(ConvertEditedSubject(edited, m_In, before, m_Out), bExpected) << pName;
+		EXPECT_EQ(m_Log.Take(), messages) << pName;
+		EXPECT_TRUE(m_Out == expected) << pName;
+		VSubject marked = before;
+		marked.m_Segments[1].m_Bounds[0] = 7;
+		ConvertEditedSubject(edited, m_In, marked, m_Out);
+		EXPECT_EQ(m_Out.m_Segments.size() > 1 && m_Out.m_Segments[1].m_Bounds[0] == 7, bTakenOver) << pName;
+	}
 }
 
 TEST_F(SubjectParametrisedConverter, ABadTargetStateFailsAndStopsTheLaterTargets)

@@ -257,7 +257,12 @@ bool VRetargetSetupCore::Replace(VSubjectItems& io_rItems, std::shared_ptr<const
 {
 	auto pSubject = std::make_shared<VSubject>();
 	// A subject that converts in part is still shown and edited; the converter has told what is wrong with it.
-	CoreOrlexTypesUtils::SubjectParametrisedConverter::ConvertSubject(*i_pParametrised, *pSubject);
+	namespace Converter = CoreOrlexTypesUtils::SubjectParametrisedConverter;
+	const VSubjectValues before = RetargetSetup::ValuesOf(io_rItems);
+	if (before.m_pParametrised && before.m_pSubject)
+		Converter::ConvertEditedSubject(*i_pParametrised, *before.m_pParametrised, *before.m_pSubject, *pSubject);
+	else
+		Converter::ConvertSubject(*i_pParametrised, *pSubject);
 
 	VSubjectItems items = io_rItems;
 	items.m_pSubject = MakeItem<VSubject>(io_rItems, "FlowSubject", std::move(pSubject));

@@ -5,6 +5,10 @@
 #include "DebugServices/GlobalLog.h"
 #include "math/NumberText.h"
 
+#include <algorithm>
+#include <optional>
+#include <utility>
+
 namespace CoreOrlexTypesUtils
 {
 
@@ -16,15 +20,49 @@ using CoreOrlexTypes::StateSize;
 using CoreOrlexTypes::VSubject;
 using CoreOrlexTypes::VSubjectParametrised;
 
+/// A segment as it was, and what was made of it under the same parameters.
+struct VSegmentBefore
+{
+	const VSubjectParametrised::VSegment& m_rParametrised;
+	const VSubject::VSegment& m_rConverted;
+};
+
+bool HaveSameParameters(const VSubjectParametrised& i_rLeft, const VSubjectParametrised& i_rRight)
+{
+	const auto isSameStatic = [](const auto& i_rOne, const auto& i_rOther)
+	{
+		return i_rOne.m_Name == i_rOther.m_Name && i_rOne.m_DefaultExpression == i_rOther.m_DefaultExpression
+		    && i_rOne.m_UserValue == i_rOther.m_UserValue && i_rOne.m_Prior == i_rOther.m_Prior;
+	};
+	const auto isSameDynamic = [](const auto& i_rOne, const auto& i_rOther)
+	{
+		return i_rOne.m_Name == i_rOther.m_Name && i_rOne.m_Value == i_rOther.m_Value
+		    && i_rOne.m_Prior == i_rOther.m_Prior;
+	};
+	return std::ranges::equal(i_rLeft.m_StaticParameters, i_rRight.m_StaticParameters, isSameStatic)
+	    && std::ranges::equal(i_rLeft.m_DynamicParameters, i_rRight.m_DynamicParameters, isSameDynamic);
+}
+
 /// Continues after a component that fails and leaves 0 there.
+/// @param i_pBefore null, or where expressions that stand as they did have their values from. One that failed left 0
+/// and fails again.
 template <std::size_t c_Count>
-bool EvaluateAll(const VDynamicExpressionParserSimple& i_rParser,
-    const std::array<std::string, c_Count>& i_rExpressions, std::array<double, c_Count>& o_rValues)
+bool EvaluateAll(const VDynamicExpressionParserSimple& i_rParser, const VSubjectParametrised::VSegment& i_rParametrised,
+    std::array<std::string, c_Count> VSubjectParametrised::VSegment::*i_pExpressions, const VSegmentBefore* i_pBefore,
+    std::array<double, c_Count> VSubject::VSegment::*i_pValues, VSubject::VSegment& o_rSegment)
 {
 	bool bGood = true;
 	std::string error;
 	for (std::size_t i = 0; i < c_Count; ++i)
-		bGood &= i_rParser.Evaluate(i_rExpressions[i], o_rValues[i], error);
+	{
+		const std::string& rExpression = (i_rParametrised.*i_pExpressions)[i];
+		double& rValue = (o_rSegment.*i_pValues)[i];
+		const double before = i_pBefore ? (i_pBefore->m_rConverted.*i_pValues)[i] : 0.0;
+		if (before != 0.0 && (i_pBefore->m_rParametrised.*i_pExpressions)[i] == rExpression)
+			rValue = before;
+		else
+			bGood &= i_rParser.Evaluate(rExpression, rValue, error);
+	}
 	return bGood;
 }
 
@@ -89,6 +127,37 @@ void ConvertTargetBack(const VSubject::VTarget& i_rTarget, VSubjectParametrised:
 		o_rParametrised.m_StateExpressions.push_back(NumberText::PrintG17(state));
 }
 
+/// @param i_pBefore null if nothing is known.
+bool ConvertSegmentAfter(const VSegmentBefore* i_pBefore, const VDynamicExpressionParserSimple& i_rParser,
+    const VSubjectParametrised::VSegment& i_rParametrised, VSubject::VSegment& o_rSegment, bool i_bUseTemplate,
+    std::vector<std::string>& io_rErrors)
+{
+	o_rSegment.m_Name = i_rParametrised.m_Name;
+	o_rSegment.m_SegmentIndex = i_rParametrised.m_SegmentIndex;
+	o_rSegment.m_ParentSegmentIndex = i_rParametrised.m_ParentSegmentIndex;
+	o_rSegment.m_TreeDepth = i_rParametrised.m_TreeDepth;
+	o_rSegment.m_InversePostRotation = i_rParametrised.m_InversePostRotation;
+	o_rSegment.m_InversePostTranslation = i_rParametrised.m_InversePostTranslation;
+
+	const bool bJoint =
+	    SubjectParametrisedConverter::ConvertJoint(i_rParametrised.m_Joint, o_rSegment.m_Joint, i_bUseTemplate);
+	const auto fail = [&](const char* i_pWhat)
+	{ io_rErrors.push_back(std::string(i_pWhat) + " segment '" + i_rParametrised.m_Name + "'"); };
+	if (!bJoint)
+		fail("Could not generate joint for");
+	const auto evaluate = [&](auto i_pExpressions, auto i_pValues)
+	{ return EvaluateAll(i_rParser, i_rParametrised, i_pExpressions, i_pBefore, i_pValues, o_rSegment); };
+	using VParametrised = VSubjectParametrised::VSegment;
+	using VConverted = VSubject::VSegment;
+	if (!evaluate(&VParametrised::m_PreTranslation, &VConverted::m_PreTranslation))
+		fail("Could not evaluate m_PreTranslation expressions in");
+	if (!evaluate(&VParametrised::m_PreRotation, &VConverted::m_PreRotation))
+		fail("Could not evaluate m_PreRotation expressions in");
+	if (!evaluate(&VParametrised::m_Bounds, &VConverted::m_Bounds))
+		fail("Could not evaluate m_Bounds expressions in");
+	return bJoint;
+}
+
 /// All but segments, markers and targets, whose lists get their lengths.
 bool Begin(const VSubjectParametrised& i_rParametrised, VDynamicExpressionParserSimple& o_rParser, VSubject& o_rSubject)
 {
@@ -134,25 +203,7 @@ bool SubjectParametrisedConverter::ConvertSegment(const VDynamicExpressionParser
     const VSubjectParametrised::VSegment& i_rParametrised, VSubject::VSegment& o_rSegment, bool i_bUseTemplate,
     std::vector<std::string>& io_rErrors)
 {
-	o_rSegment.m_Name = i_rParametrised.m_Name;
-	o_rSegment.m_SegmentIndex = i_rParametrised.m_SegmentIndex;
-	o_rSegment.m_ParentSegmentIndex = i_rParametrised.m_ParentSegmentIndex;
-	o_rSegment.m_TreeDepth = i_rParametrised.m_TreeDepth;
-	o_rSegment.m_InversePostRotation = i_rParametrised.m_InversePostRotation;
-	o_rSegment.m_InversePostTranslation = i_rParametrised.m_InversePostTranslation;
-
-	const bool bJoint = ConvertJoint(i_rParametrised.m_Joint, o_rSegment.m_Joint, i_bUseTemplate);
-	const auto fail = [&](const char* i_pWhat)
-	{ io_rErrors.push_back(std::string(i_pWhat) + " segment '" + i_rParametrised.m_Name + "'"); };
-	if (!bJoint)
-		fail("Could not generate joint for");
-	if (!EvaluateAll(i_rParser, i_rParametrised.m_PreTranslation, o_rSegment.m_PreTranslation))
-		fail("Could not evaluate m_PreTranslation expressions in");
-	if (!EvaluateAll(i_rParser, i_rParametrised.m_PreRotation, o_rSegment.m_PreRotation))
-		fail("Could not evaluate m_PreRotation expressions in");
-	if (!EvaluateAll(i_rParser, i_rParametrised.m_Bounds, o_rSegment.m_Bounds))
-		fail("Could not evaluate m_Bounds expressions in");
-	return bJoint;
+	return ConvertSegmentAfter(nullptr, i_rParser, i_rParametrised, o_rSegment, i_bUseTemplate, io_rErrors);
 }
 
 bool SubjectParametrisedConverter::ConvertTarget(const VDynamicExpressionParserSimple& i_rParser,
@@ -228,10 +279,27 @@ bool SubjectParametrisedConverter::ConvertMarker(
 
 bool SubjectParametrisedConverter::ConvertSubject(const VSubjectParametrised& i_rParametrised, VSubject& o_rSubject)
 {
+	return ConvertEditedSubject(i_rParametrised, {}, {}, o_rSubject);
+}
+
+bool SubjectParametrisedConverter::ConvertEditedSubject(const VSubjectParametrised& i_rParametrised,
+    const VSubjectParametrised& i_rBefore, const VSubject& i_rConvertedBefore, VSubject& o_rSubject)
+{
 	VDynamicExpressionParserSimple parser;
 	bool bGood = Begin(i_rParametrised, parser, o_rSubject);
+	const std::size_t known = HaveSameParameters(i_rParametrised, i_rBefore)
+	    ? std::min(i_rBefore.m_Segments.size(), i_rConvertedBefore.m_Segments.size())
+	    : 0;
+	std::vector<std::string> errors;
 	for (std::size_t i = 0; bGood && i < o_rSubject.m_Segments.size(); ++i)
-		bGood = ConvertSegment(parser, i_rParametrised.m_Segments[i], o_rSubject.m_Segments[i], false);
+	{
+		std::optional<VSegmentBefore> before;
+		if (i < known)
+			before.emplace(VSegmentBefore{i_rBefore.m_Segments[i], i_rConvertedBefore.m_Segments[i]});
+		bGood = ConvertSegmentAfter(before ? &*before : nullptr, parser, i_rParametrised.m_Segments[i],
+		    o_rSubject.m_Segments[i], false, errors);
+		LogErrors(std::exchange(errors, {}));
+	}
 	for (std::size_t i = 0; bGood && i < o_rSubject.m_Markers.size(); ++i)
 		bGood = ConvertMarker(i_rParametrised.m_Markers[i], o_rSubject.m_Markers[i]);
 	for (std::size_t i = 0; bGood && i < o_rSubject.m_Targets.size(); ++i)

@@ -16,6 +16,13 @@ namespace CoreOrlexTypesUtils::SubjectParametrisedConverter
 /// result false.
 bool ConvertSubject(const CoreOrlexTypes::VSubjectParametrised& i_rParametrised, CoreOrlexTypes::VSubject& o_rSubject);
 
+/// The same for a subject that was edited: expressions of segments that stand as they did, while all parameters do, are
+/// not evaluated again.
+/// @param i_rConvertedBefore what ConvertSubject made of i_rBefore.
+bool ConvertEditedSubject(const CoreOrlexTypes::VSubjectParametrised& i_rParametrised,
+    const CoreOrlexTypes::VSubjectParametrised& i_rBefore, const CoreOrlexTypes::VSubject& i_rConvertedBefore,
+    CoreOrlexTypes::VSubject& o_rSubject);
+
 /// A target whose state does not evaluate, and why.
 struct VTargetFailure
 {
