@@ -1,5 +1,6 @@
 #include "CoreGraphics/RenderContext.h"
 #include "OrlexGraphics/frame/FrameRenderer.h"
+#include "OrlexGraphics/item/Samples.h"
 #include "OrlexGraphics/stage/SphereHelper.h"
 #include "SceneFixture.h"
 #include "ViewFixture.h"
@@ -7,6 +8,7 @@
 #include <QImage>
 
 #include <cmath>
+#include <memory>
 
 namespace
 {
@@ -47,6 +49,24 @@ protected:
 };
 
 INSTANTIATE_IN_BOTH_DIALECTS(Offscreen);
+
+TEST(Samples, LeaveFramebuffersOfOtherContextsAlone)
+{
+	GraphicsTest::VOffscreenContext first(GraphicsTest::EDialect::Desktop);
+	if (!OrlexGraphics::VSamples::AreReadable())
+		GTEST_SKIP() << "no textures of samples here";
+	auto pSamples = std::make_unique<OrlexGraphics::VSamples>();
+	QOpenGLFramebufferObjectFormat format;
+	format.setSamples(4);
+	pSamples->Make(QSize(8, 8), format);
+	ASSERT_TRUE(pSamples->AreThere());
+	// A view that was moved to another window has them for a little longer than their context.
+	GraphicsTest::VOffscreenContext second(GraphicsTest::EDialect::Desktop);
+	const QOpenGLFramebufferObject other(8, 8);
+	EXPECT_EQ(other.handle(), pSamples->Framebuffer()) << "of the same name";
+	pSamples.reset();
+	EXPECT_TRUE(second.GL().glIsFramebuffer(other.handle()));
+}
 
 TEST_P(Offscreen, DrawsAndPicksWithoutAWindow)
 {

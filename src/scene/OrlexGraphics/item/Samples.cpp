@@ -123,11 +123,6 @@ bool VSamples::AreReadable()
 	    && (format.version() >= qMakePair(4, 3) || rContext.hasExtension("GL_ARB_texture_storage_multisample"));
 }
 
-VSamples::~VSamples()
-{
-	Release();
-}
-
 void VSamples::Release()
 {
 	if (QOpenGLContext* const pContext = QOpenGLContext::currentContext())

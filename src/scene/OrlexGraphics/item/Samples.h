@@ -11,7 +11,7 @@ namespace OrlexGraphics
 {
 
 /// A framebuffer whose samples stay in a texture: what shows it takes the mean of each pixel's samples itself, instead
-/// of a copy that the driver makes of them in between. With the context current, the destructor too.
+/// of a copy that the driver makes of them in between. With the context current; to be released in it.
 class VSamples
 {
 public:
@@ -19,20 +19,20 @@ public:
 	static bool AreReadable();
 
 	VSamples() = default;
-	~VSamples();
 	VSamples(const VSamples&) = delete;
 	VSamples& operator=(const VSamples&) = delete;
 
 	/// Of this size, with colour and depth; none for a format of one sample a pixel, or where there is no room.
 	void Make(const QSize& i_rSize, const QOpenGLFramebufferObjectFormat& i_rFormat);
+	/// Needs the context that they were made in, where framebuffers have their names: what still holds them shows
+	/// nothing.
+	void Release();
 	bool AreThere() const { return m_Framebuffer != 0; }
 	const QSize& Size() const { return m_Size; }
 	unsigned int Framebuffer() const { return m_Framebuffer; }
 	unsigned int Texture() const { return m_Texture; }
 
 private:
-	void Release();
-
 	QSize m_Size;
 	unsigned int m_Framebuffer = 0;
 	unsigned int m_Texture = 0;

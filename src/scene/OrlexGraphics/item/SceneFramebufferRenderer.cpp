@@ -31,6 +31,9 @@ VSceneFramebufferRenderer::VSceneFramebufferRenderer()
 
 VSceneFramebufferRenderer::~VSceneFramebufferRenderer()
 {
+	// The item may hold them for longer.
+	if (m_pSamples)
+		m_pSamples->Release();
 	--s_Living;
 }
 
