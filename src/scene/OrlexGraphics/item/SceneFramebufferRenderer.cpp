@@ -31,7 +31,7 @@ VSceneFramebufferRenderer::VSceneFramebufferRenderer()
 
 VSceneFramebufferRenderer::~VSceneFramebufferRenderer()
 {
-	// The item may hold them for longer.
+	// The material of what showed them may hold them for longer.
 	if (m_pSamples)
 		m_pSamples->Release();
 	--s_Living;
