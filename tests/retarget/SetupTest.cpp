@@ -1,6 +1,7 @@
 #include "Rows.h"
 
 #include "FileDigest/FileDigest.h"
+#include "SetupIO/Limits.h"
 #include "SetupIO/ReadSetup.h"
 #include "SetupIO/WriteSetup.h"
 
@@ -35,6 +36,13 @@ TEST(Setup, TellsLineAndReasonOfWhatIsWrong)
 	    {"{\"checks\": {\"sounds\": true}}", 1, "no field \"sounds\""},
 	    {"{\"root-height\": \"high\"}", 1, "\"keep\" or \"scale\""},
 	    {"{\"comment\": \"\xFF\"}", 1, "no JSON"},
+	    {"{\"pairs\": [{\"target\": \"b\"}]}", 1, "a pair has no \"source\""},
+	    {"{\"pairs\": [{\"from\": \"a\"}]}", 1, "no field \"from\"; there are source, target"},
+	    {"{\"edits\": [\n{\"comment\": \"c\"}]}", 2, "an edit has no name"},
+	    {"{\"edits\": [{\"scale\": null}]}", 1, "\"scale\" is to be a text, a number, or true"},
+	    {"{\"checks\": {\"comment\": \"c\", \"pose\": [\"knees\"]}}", 1, "called \"knees\"; there are facing, sides"},
+	    {"{\"checks\": {\"targets\": 2e9}}", 1, "\"targets\" is to be a count, not 2"},
+	    {std::string(std::size_t(SetupIO::Limits::c_FileBytes) + 1, ' '), 0, "it is larger than"},
 	    {"{\"pairs\": " + std::string(40, '[') + "}", 1, "nested more than 16 deep"},
 	};
 	for (const VWrong& rRow : rows)
@@ -78,7 +86,7 @@ TEST(Setup, WritesWhatItReads)
 	ASSERT_TRUE(SetupIO::ReadSetup(c_Recipe, setup, fault)) << fault.m_Reason;
 	EXPECT_EQ(setup.m_Root, "#0");
 	EXPECT_EQ(setup.m_Edits.at(4).m_Value, "1.25");
-	EXPECT_EQ(setup.m_Edits.at(5).m_Line, 11u);
+	EXPECT_EQ(setup.m_Edits.at(5).m_Line.m_Value, 11u);
 	SetupIO::VSetup back;
 	const std::string text = SetupIO::WriteSetup(setup);
 	ASSERT_TRUE(SetupIO::ReadSetup(text, back, fault)) << fault.m_Reason << text;

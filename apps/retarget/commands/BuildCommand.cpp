@@ -29,8 +29,9 @@ struct VBuildSettings
 /// A field of the text, as "FILE:LINE: "; its first line for one that it does not have.
 std::string WhereOf(const SetupIO::VSetup& i_rSetup, const std::string& i_rPath, const std::string& i_rField)
 {
-	const auto field = std::ranges::find(i_rSetup.m_Fields, i_rField, &std::pair<std::string, std::size_t>::first);
-	return i_rPath + ":" + std::to_string(field == i_rSetup.m_Fields.end() ? 1 : field->second) + ": ";
+	const auto& rFields = i_rSetup.m_Fields.m_Value;
+	const auto field = std::ranges::find(rFields, i_rField, &std::pair<std::string, std::size_t>::first);
+	return i_rPath + ":" + std::to_string(field == rFields.end() ? 1 : field->second) + ": ";
 }
 
 VMaking MakingOf(const SetupIO::VSetup& i_rRecipe, const std::string& i_rPath)

@@ -550,9 +550,9 @@ VEdits EditsOf(const SetupIO::VSetup& i_rSetup, const std::string& i_rPath, bool
 {
 	VEdits edits;
 	for (const SetupIO::VPair& rPair : i_rSetup.m_Pairs)
-		edits.push_back({nullptr, {}, i_rPath + ":" + std::to_string(rPair.m_Line) + ": ", rPair});
+		edits.push_back({nullptr, {}, i_rPath + ":" + std::to_string(rPair.m_Line.m_Value) + ": ", rPair});
 	for (const SetupIO::VEdit& rEdit : i_rSetup.m_Edits)
-		edits.push_back(MakeEdit("--" + rEdit.m_Name, rEdit.m_Value, i_rPath, rEdit.m_Line, i_bOfCreate));
+		edits.push_back(MakeEdit("--" + rEdit.m_Name, rEdit.m_Value, i_rPath, rEdit.m_Line.m_Value, i_bOfCreate));
 	return edits;
 }
 

@@ -145,7 +145,7 @@ TakeSolve::VSourceSettings ReadPairs(const VPairSettings& i_rSettings)
 	{
 		if (rPair.m_Position || rPair.m_Rotation)
 			throw VCommandError(EBadInput,
-			    i_rSettings.m_File + ":" + std::to_string(rPair.m_Line)
+			    i_rSettings.m_File + ":" + std::to_string(rPair.m_Line.m_Value)
 			        + ": A joint drives a segment whole: its pair has neither \"position\" nor \"rotation\"");
 		settings.m_Joints.push_back({rPair.m_Source, rPair.m_Target});
 	}

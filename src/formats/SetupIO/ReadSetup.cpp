@@ -43,7 +43,7 @@ const std::string& Text(const VTextNode& i_rNode)
 double NotNegative(const VTextNode& i_rNode)
 {
 	Require(i_rNode, VTextNode::ENumber, "a number");
-	if (!std::isfinite(i_rNode.m_Number) || i_rNode.m_Number < 0.0)
+	if (i_rNode.m_Number < 0.0)
 		Refuse(i_rNode, Quoted(i_rNode.m_Name) + " cannot be " + i_rNode.m_Text + ": it is 0 or more");
 	return i_rNode.m_Number;
 }
@@ -103,7 +103,7 @@ VPair ReadPair(const VTextNode& i_rNode)
 {
 	Require(i_rNode, VTextNode::EObject, "a pair: {\"source\": \"...\", \"target\": \"...\"}");
 	VPair pair;
-	pair.m_Line = i_rNode.m_Line;
+	pair.m_Line = {i_rNode.m_Line};
 	for (const VTextNode& rField : i_rNode.m_Items)
 	{
 		std::string known;
@@ -122,7 +122,7 @@ VEdit ReadEdit(const VTextNode& i_rNode)
 {
 	Require(i_rNode, VTextNode::EObject, "an edit: {\"position\": \"Hips:pelvis\"}");
 	VEdit edit;
-	edit.m_Line = i_rNode.m_Line;
+	edit.m_Line = {i_rNode.m_Line};
 	for (const VTextNode& rField : i_rNode.m_Items)
 	{
 		if (rField.m_Name == Fields::c_Comment)
@@ -135,7 +135,7 @@ VEdit ReadEdit(const VTextNode& i_rNode)
 			    "an edit has one name beside its comment, and this one has " + Quoted(edit.m_Name) + " and "
 			        + Quoted(rField.m_Name));
 		edit.m_Name = rField.m_Name;
-		edit.m_Line = rField.m_Line;
+		edit.m_Line = {rField.m_Line};
 		if (rField.m_Kind == VTextNode::EText || rField.m_Kind == VTextNode::ENumber)
 			edit.m_Value = rField.m_Text;
 		else if (rField.m_Kind != VTextNode::EBoolean || !rField.m_bTrue)
@@ -208,7 +208,7 @@ void ReadField(const VTextNode& i_rNode, VSetup& io_rSetup)
 	if (i_rNode.m_Name == Fields::c_RootHeight && io_rSetup.m_RootHeight != Fields::c_Keep
 	    && io_rSetup.m_RootHeight != Fields::c_Scale)
 		Refuse(i_rNode, "\"root-height\" is to be \"keep\" or \"scale\"");
-	io_rSetup.m_Fields.emplace_back(i_rNode.m_Name, i_rNode.m_Line);
+	io_rSetup.m_Fields.m_Value.emplace_back(i_rNode.m_Name, i_rNode.m_Line);
 }
 
 } // namespace
@@ -237,7 +237,8 @@ bool ReadSetup(std::string_view i_Text, VSetup& o_rSetup, VFault& o_rFault)
 bool HasOnly(
     const VSetup& i_rSetup, std::initializer_list<std::string_view> i_Fields, const char* i_pUse, VFault& o_rFault)
 {
-	for (const auto& [rName, line] : i_rSetup.m_Fields)
+	const auto& rFields = i_rSetup.m_Fields.m_Value;
+	for (const auto& [rName, line] : rFields)
 		if (rName != Fields::c_Comment && std::ranges::find(i_Fields, rName) == i_Fields.end())
 		{
 			o_rFault = {line, Quoted(rName) + " does not belong into " + i_pUse};
@@ -245,10 +246,9 @@ bool HasOnly(
 		}
 	if (i_Fields.size() == 1 && *i_Fields.begin() == Fields::c_Pairs && i_rSetup.m_Pairs.empty())
 	{
-		const auto field =
-		    std::ranges::find(i_rSetup.m_Fields, Fields::c_Pairs, &std::pair<std::string, std::size_t>::first);
-		o_rFault = {field == i_rSetup.m_Fields.end() ? 1 : field->second,
-		    std::string(i_pUse) + " needs pairs, and there are none"};
+		const auto field = std::ranges::find(rFields, Fields::c_Pairs, &std::pair<std::string, std::size_t>::first);
+		o_rFault = {
+		    field == rFields.end() ? 1 : field->second, std::string(i_pUse) + " needs pairs, and there are none"};
 		return false;
 	}
 	return true;

@@ -11,6 +11,15 @@
 namespace SetupIO
 {
 
+/// What is known of the text that something was read from, and no part of what it says: two compare equal.
+template <typename T>
+struct VOfText
+{
+	T m_Value{};
+
+	bool operator==(const VOfText&) const { return true; }
+};
+
 /// What belongs together: segments of a performer and of a character, or joints of a take and segments.
 struct VPair
 {
@@ -20,14 +29,10 @@ struct VPair
 	std::optional<double> m_Position;
 	std::optional<double> m_Rotation;
 	std::string m_Comment;
-	/// Of the text that it was read from, from 1; 0 for none.
-	std::size_t m_Line = 0;
+	/// From 1; 0 for none.
+	VOfText<std::size_t> m_Line{};
 
-	bool operator==(const VPair& i_rOther) const
-	{
-		return m_Source == i_rOther.m_Source && m_Target == i_rOther.m_Target && m_Position == i_rOther.m_Position
-		    && m_Rotation == i_rOther.m_Rotation && m_Comment == i_rOther.m_Comment;
-	}
+	bool operator==(const VPair&) const = default;
 };
 
 /// One step, as "retarget edit" has it as an option.
@@ -38,12 +43,9 @@ struct VEdit
 	/// As the option takes it; nothing for one that takes none.
 	std::optional<std::string> m_Value;
 	std::string m_Comment;
-	std::size_t m_Line = 0;
+	VOfText<std::size_t> m_Line{};
 
-	bool operator==(const VEdit& i_rOther) const
-	{
-		return m_Name == i_rOther.m_Name && m_Value == i_rOther.m_Value && m_Comment == i_rOther.m_Comment;
-	}
+	bool operator==(const VEdit&) const = default;
 };
 
 /// What must hold of what a recipe makes, or nothing is written.
@@ -84,17 +86,10 @@ struct VSetup
 	std::vector<VEdit> m_Edits;
 	std::optional<VChecks> m_Checks;
 
-	/// Which fields the text had, with their lines.
-	std::vector<std::pair<std::string, std::size_t>> m_Fields;
+	/// Which fields there are, also empty ones, with their lines.
+	VOfText<std::vector<std::pair<std::string, std::size_t>>> m_Fields{};
 
-	/// Lines and which fields are there but empty do not count.
-	bool operator==(const VSetup& i_rOther) const
-	{
-		return m_Comment == i_rOther.m_Comment && m_Fbx == i_rOther.m_Fbx && m_Subject == i_rOther.m_Subject
-		    && m_Source == i_rOther.m_Source && m_Output == i_rOther.m_Output && m_Root == i_rOther.m_Root
-		    && m_RootHeight == i_rOther.m_RootHeight && m_Pairs == i_rOther.m_Pairs && m_Edits == i_rOther.m_Edits
-		    && m_Checks == i_rOther.m_Checks;
-	}
+	bool operator==(const VSetup&) const = default;
 };
 
 } // namespace SetupIO

@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <iterator>
+#include <utility>
 
 namespace SetupIO
 {
@@ -39,7 +40,6 @@ public:
 		return *this;
 	}
 	bool operator==(const VCounting& i_rOther) const { return m_pAt == i_rOther.m_pAt; }
-	bool operator!=(const VCounting& i_rOther) const { return m_pAt != i_rOther.m_pAt; }
 
 private:
 	const char* m_pAt;
@@ -55,31 +55,22 @@ public:
 	{
 	}
 
-	bool null() override { return Add(VTextNode::ENull) != nullptr; }
-	bool boolean(bool i_bTrue) override
+	bool null() override { return Add(VTextNode::ENull); }
+	bool boolean(bool i_bTrue) override { return Add(VTextNode::EBoolean, {}, 0.0, i_bTrue); }
+	bool number_integer(number_integer_t i_Value) override
 	{
-		VTextNode* const pNode = Add(VTextNode::EBoolean);
-		if (pNode)
-			pNode->m_bTrue = i_bTrue;
-		return pNode != nullptr;
+		return Add(VTextNode::ENumber, std::to_string(i_Value), double(i_Value));
 	}
-	bool number_integer(number_integer_t i_Value) override { return Number(double(i_Value), std::to_string(i_Value)); }
 	bool number_unsigned(number_unsigned_t i_Value) override
 	{
-		return Number(double(i_Value), std::to_string(i_Value));
+		return Add(VTextNode::ENumber, std::to_string(i_Value), double(i_Value));
 	}
 	/// The text that comes along has the decimal point of the process's language.
 	bool number_float(number_float_t i_Value, const string_t& /*i_rText*/) override
 	{
-		return Number(i_Value, NumberText::PrintShortest(i_Value));
+		return Add(VTextNode::ENumber, NumberText::PrintShortest(i_Value), i_Value);
 	}
-	bool string(string_t& i_rText) override
-	{
-		VTextNode* const pNode = Add(VTextNode::EText);
-		if (pNode)
-			pNode->m_Text = std::move(i_rText);
-		return pNode != nullptr;
-	}
+	bool string(string_t& i_rText) override { return Add(VTextNode::EText, std::move(i_rText)); }
 	bool binary(binary_t&) override { return false; }
 	bool start_object(std::size_t) override { return Open(VTextNode::EObject); }
 	bool start_array(std::size_t) override { return Open(VTextNode::EList); }
@@ -108,36 +99,20 @@ public:
 private:
 	bool Refuse(std::string i_Reason)
 	{
-		if (m_rFault.m_Reason.empty())
-			m_rFault = {m_rProgress.m_Line, std::move(i_Reason)};
+		m_rFault = {m_rProgress.m_Line, std::move(i_Reason)};
 		return false;
 	}
 
-	/// Null if there are too many, which is then the fault.
-	VTextNode* Add(VTextNode::EKind i_Kind)
+	/// False if there are too many, which is then the fault.
+	bool Add(VTextNode::EKind i_Kind, std::string i_Text = {}, double i_Number = 0.0, bool i_bTrue = false)
 	{
 		if (++m_Count > Limits::c_Values)
-		{
-			Refuse("there are more than " + std::to_string(Limits::c_Values) + " values");
-			return nullptr;
-		}
-		VTextNode& rNode = m_Open.empty() ? m_rRoot : m_Open.back()->m_Items.emplace_back();
-		rNode.m_Kind = i_Kind;
-		rNode.m_Line = m_rProgress.m_Line;
-		if (!m_Open.empty() && m_Open.back()->m_Kind == VTextNode::EObject)
-			rNode.m_Name = std::move(m_Name);
-		return &rNode;
-	}
-
-	bool Number(double i_Value, const std::string& i_rText)
-	{
-		VTextNode* const pNode = Add(VTextNode::ENumber);
-		if (!pNode)
-			return false;
-		pNode->m_Number = i_Value;
-		pNode->m_Text = i_rText;
+			return Refuse("there are more than " + std::to_string(Limits::c_Values) + " values");
+		m_pLast = m_Open.empty() ? &m_rRoot : &m_Open.back()->m_Items.emplace_back();
 		// The parser knows that a number ends by what stands behind it.
-		pNode->m_Line -= m_rProgress.m_Last == '\n';
+		const bool bBehind = i_Kind == VTextNode::ENumber && m_rProgress.m_Last == '\n';
+		*m_pLast = {
+		    i_Kind, m_rProgress.m_Line - bBehind, std::exchange(m_Name, {}), std::move(i_Text), i_Number, i_bTrue, {}};
 		return true;
 	}
 
@@ -145,11 +120,11 @@ private:
 	{
 		if (m_Open.size() == Limits::c_Depth)
 			return Refuse("it is nested more than " + std::to_string(Limits::c_Depth) + " deep");
-		VTextNode* const pNode = Add(i_Kind);
+		if (!Add(i_Kind))
+			return false;
 		// What is open stays where it is: only the last one of all grows.
-		if (pNode)
-			m_Open.push_back(pNode);
-		return pNode != nullptr;
+		m_Open.push_back(m_pLast);
+		return true;
 	}
 
 	bool Close()
@@ -162,6 +137,8 @@ private:
 	VTextNode& m_rRoot;
 	VFault& m_rFault;
 	std::vector<VTextNode*> m_Open;
+	VTextNode* m_pLast = nullptr;
+	/// Of the member whose value comes next.
 	std::string m_Name;
 	std::size_t m_Count = 0;
 };
