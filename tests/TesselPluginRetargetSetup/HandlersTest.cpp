@@ -481,6 +481,13 @@ TEST_F(Handlers, TheSourceThatIsThereIsNotReadAgain)
 	EXPECT_NE(TakeLog().find("The skin 'OrlexA' was chosen for source 'performer', and 'anna' wears it now"),
 	    std::string::npos);
 	EXPECT_EQ(m_pDocument->SourceValues().m_pApplicationData->m_Skin, "OrlexA");
+	EXPECT_EQ(m_pDocument->SaveTargetSubject(m_Folder / "a.qrr"), 0u);
+	EXPECT_EQ(Type("SourceSkeleton", "performer"), "");
+	EXPECT_EQ(m_pDocument->LoadTargetSubject(m_Folder / "a.qrr"), 0u);
+	const fs::path other = Copy(c_DemoSource, "elsewhere/bea.qrs");
+	Parameter("SourceSkeleton").SetValue(ToVariant(other.string()));
+	Run();
+	EXPECT_EQ(m_pDocument->GetShownSourceName(), "bea") << "chosen before the panel had heard of the subject";
 }
 
 TEST_F(Handlers, StoredValuesAreThereAgain)

@@ -291,6 +291,8 @@ void VRetargetSetupWidget::OnSetupChanged()
 {
 	OnTargetScaleChanged();
 	SyncScaleParameter();
+	// One that was chosen since, as by files that are dropped together, would be lost to the document's.
+	OnSourceSkeletonChanged();
 	SyncSourceSkeletonParameter();
 	OnSelectionChangedShowTarget();
 	UpdateRemarks();
