@@ -129,16 +129,16 @@ std::optional<VRetargetSetupCore::VAlignedEdit> VRetargetSetupCore::Aligned(
 		target.m_pParametrised = std::move(pPosed);
 		target.m_pSubject = std::move(pConverted);
 		edit.m_Commands.insert(edit.m_Commands.begin(),
-		    {RetargetSetup::c_FbxPoseCommand, UtilsFileSystem::ToUtf8(m_TargetFBXFile.m_Path), {}, 0});
+		    {RetargetSetup::c_FbxPoseCommand, UtilsFileSystem::ToUtf8(m_TargetFBXFile.m_Path), {}, {}});
 	}
 	else
 	{
 		if (StandsAsMade())
-			edit.m_Commands.insert(edit.m_Commands.begin(), {RetargetSetup::c_AsItStandsCommand, {}, {}, 0});
+			edit.m_Commands.insert(edit.m_Commands.begin(), {RetargetSetup::c_AsItStandsCommand, {}, {}, {}});
 		edit.m_Commands.insert(edit.m_Commands.begin(),
-		    bones.empty()
-		        ? SetupIO::VEdit{RetargetSetup::c_OnJointsCommand, {}, {}, 0}
-		        : SetupIO::VEdit{RetargetSetup::c_SkinCommand, UtilsFileSystem::ToUtf8(m_TargetFBXFile.m_Path), {}, 0});
+		    bones.empty() ? SetupIO::VEdit{RetargetSetup::c_OnJointsCommand, {}, {}, {}}
+		                  : SetupIO::VEdit{
+		                      RetargetSetup::c_SkinCommand, UtilsFileSystem::ToUtf8(m_TargetFBXFile.m_Path), {}, {}});
 	}
 	std::string reason;
 	auto aligned = RetargetSetup::AlignToSource(*source.m_pParametrised, *source.m_pSubject, *target.m_pParametrised,

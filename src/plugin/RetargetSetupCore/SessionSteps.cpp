@@ -24,7 +24,7 @@ using VEdits = std::vector<SetupIO::VEdit>;
 
 SetupIO::VEdit Command(const char* i_pName, std::optional<std::string> i_Value = {})
 {
-	return {i_pName, std::move(i_Value), {}, 0};
+	return {i_pName, std::move(i_Value), {}, {}};
 }
 
 std::string Assigned(std::size_t i_Target, const std::string& i_rValue)
