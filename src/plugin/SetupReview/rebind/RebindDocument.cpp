@@ -28,12 +28,12 @@ bool TakeOver(VRetargetSetupCore& io_rDocument, const VRebound& i_rRebound, bool
 {
 	RetargetSetup::VEdit edit{RetargetSetup::Steps::c_Rebind};
 	if (!i_rRebound.m_Lost.empty())
-		edit.m_Commands.push_back({"allow-partial", {}, {}, 0});
+		edit.m_Commands.push_back({"allow-partial", {}, {}, {}});
 	if (i_bPerformer)
-		edit.m_Commands.push_back({"rebind-source", {}, {}, 0});
+		edit.m_Commands.push_back({"rebind-source", {}, {}, {}});
 	else
 		edit.m_Commands.push_back(
-		    {RetargetSetup::c_RebindFbxCommand, UtilsFileSystem::ToUtf8(io_rDocument.GetTargetFBXPath()), {}, 0});
+		    {RetargetSetup::c_RebindFbxCommand, UtilsFileSystem::ToUtf8(io_rDocument.GetTargetFBXPath()), {}, {}});
 	// A file that was written over cannot be read as it was.
 	if (!i_bPerformer && io_rDocument.StepsReadAgain(io_rDocument.GetTargetFBXPath()))
 		edit.m_Commands.clear();
