@@ -1,5 +1,6 @@
 // A subject as typed bytes and back, beside the copy of the value, which any way of passing it on must cost at least,
 // and beside its text form; and one number of a parameter.
+#include "../Ratios.h"
 #include "CoreOrlexTypes/RandomValue.h"
 
 #include "CoreOrlexTypes/TextForm.h"
@@ -95,3 +96,8 @@ void BM_GetNumber(benchmark::State& io_rState)
 BENCHMARK(BM_GetNumber);
 
 } // namespace
+
+int main(int i_Count, char** i_ppArguments)
+{
+	return Ratios::Main(i_Count, i_ppArguments, {});
+}

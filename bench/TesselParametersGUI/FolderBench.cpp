@@ -1,5 +1,6 @@
 // A folder of many files: reading it again into the permitted values of a parameter, beside the plain list of its
 // entries by Qt; and the update of the list model behind a control, which the user waits for with each choice.
+#include "../Ratios.h"
 #include "TesselParametersGUI/ParameterEnumFolderWatcher.h"
 #include "TesselParametersGUI/ParameterGroupModel.h"
 
@@ -80,3 +81,8 @@ void BM_ModelFollowsAChoice(benchmark::State& io_rState)
 BENCHMARK(BM_ModelFollowsAChoice)->Arg(100)->Arg(5000)->Unit(benchmark::kMillisecond);
 
 } // namespace
+
+int main(int i_Count, char** i_ppArguments)
+{
+	return Ratios::Main(i_Count, i_ppArguments, {});
+}
