@@ -291,7 +291,7 @@ void VRetargetSetupWidget::OnSetupChanged()
 {
 	OnTargetScaleChanged();
 	SyncScaleParameter();
-	// One that was chosen since, as by files that are dropped together, would be lost to the document's.
+	// One that was chosen since would be lost to the document's.
 	OnSourceSkeletonChanged();
 	SyncSourceSkeletonParameter();
 	OnSelectionChangedShowTarget();
