@@ -18,6 +18,8 @@ std::vector<VEnumEntry> ReadEnumeration(
     const TesselPluginInterface::IDataReader& i_rAttributes, const NVX::IO::VSchemaPointer& i_rpValue)
 {
 	std::vector<VEnumEntry> entries;
+	if (!i_rAttributes.HasValue(AttributeKeys::c_Enum))
+		return entries;
 	const NVX::IO::VSchemaPointer pSchema = EnumerationSchema(i_rpValue);
 	VVariant list;
 	if (!i_rAttributes.Get(AttributeKeys::c_Enum, pSchema, list) || !SameSchema(list.m_pSchema, pSchema))

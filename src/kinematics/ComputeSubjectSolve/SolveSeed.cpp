@@ -2,6 +2,7 @@
 
 #include "ComputeSubjectFK/ComputeSubjectFK.h"
 
+#include <Eigen/LU>
 #include <Eigen/SVD>
 
 #include <cmath>
