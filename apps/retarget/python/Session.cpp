@@ -143,7 +143,7 @@ private:
 	{
 		SetupIO::VSetup setup;
 		for (const auto& [rName, rValue] : i_rEdits)
-			setup.m_Edits.push_back({rName, rValue, {}, setup.m_Edits.size() + 1});
+			setup.m_Edits.push_back({rName, rValue, {}, {setup.m_Edits.size() + 1}});
 		return EditsOf(setup, "edit", m_bOfFbx);
 	}
 
