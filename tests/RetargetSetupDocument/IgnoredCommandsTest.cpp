@@ -67,6 +67,7 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	        [this] { m_Document.RestoreTargetSubjectURL(Url("none.qrr"), {}); },
 	        "'" + File("none.qrr") + "' could not be loaded. The target subject is still the one before."},
 	    {"nothing", [] {}, "AddTarget", [this] { m_Document.AddTarget(0, 0, true, true); }, c_NoSource},
+	    {"nothing", [] {}, "AddTargets", [this] { m_Document.AddTargets({}); }, c_NoSource},
 	    {"nothing", [] {}, "RemoveTarget", [this] { m_Document.RemoveTarget(0); }, c_NoTarget},
 	    {"nothing", [] {}, "UpdateTargets", [this] { m_Document.UpdateTargets(); }, c_NoSource},
 	    {"nothing", [] {}, "CreateAllJoints", [this] { m_Document.CreateAllJoints(); }, c_NoTarget},
@@ -93,6 +94,16 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 	    {"a source", [] {}, "ProposeTargets", [this] { m_Document.ProposeTargets(0.5); }, c_NoTarget},
 	    {"both", [this] { SetSmallSubjects(); }, "AddTarget", [this] { m_Document.AddTarget(-1, 0, true, true); },
 	        "No single segment of the source subject is selected."},
+	    {"both", [] {}, "AddTargets",
+	        [this] {
+		        m_Document.AddTargets({QVariantMap{{"source", -1}}});
+	        },
+	        "No single segment of the source subject is selected."},
+	    {"both", [] {}, "AddTargets",
+	        [this] {
+		        m_Document.AddTargets({QVariantMap{{"target", 5}}});
+	        },
+	        "No single segment of the target subject is selected."},
 	    {"both", [] {}, "FitPreset", [this] { m_Document.FitPreset(Url("none.json"), 0.5); },
 	        "'" + File("none.json") + "' could not be read as a preset: Could not read '" + File("none.json")
 	            + "': No such file or directory"},

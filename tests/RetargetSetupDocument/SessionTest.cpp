@@ -30,6 +30,7 @@ protected:
 		ASSERT_TRUE(m_Document.LoadSourceSubject(RETARGET_SOURCE "/demo/performer.qrs", ""));
 		m_Document.CreateTargetSubject();
 		m_Document.AddTarget(0, 0, true, false);
+		m_Document.AddTarget(0, 0, false, false);
 	}
 
 	std::string File(const char* i_pName) const { return (m_Folder / i_pName).string(); }
@@ -64,14 +65,16 @@ TEST_F(Session, TellsWhatHasChanged)
 	    {"one text of an offset",
 	        [](auto& io_rSubject) { io_rSubject.m_Targets[0].m_StateExpressions[1] = "12.5*GlobalScale"; },
 	        " --expressions 0=,12.5,"},
+	    {"a text of a rotation", [](auto& io_rSubject) { io_rSubject.m_Targets[1].m_StateExpressions[2] = "pi/2"; },
+	        " --expressions 1=,,pi/2"},
 	    {"another target of the same source",
 	        [](auto& io_rSubject)
 	        {
 		        io_rSubject.m_Targets.push_back(io_rSubject.m_Targets[0]);
-		        io_rSubject.m_Targets[1].m_SegmentIndices[0] = 3;
-		        io_rSubject.m_Targets[1].m_Weight = 0.25;
+		        io_rSubject.m_Targets[2].m_SegmentIndices[0] = 3;
+		        io_rSubject.m_Targets[2].m_Weight = 0.25;
 	        },
-	        " --position Pelvis:breast --weight 1=0.25"},
+	        " --position Pelvis:breast --weight 2=0.25"},
 	    {"nothing", [](auto&) {}, ""},
 	    {"a joint of another type",
 	        [](auto& io_rSubject) { io_rSubject.m_Segments[1].m_Joint.m_JointType = VJoint::EDummy; }, nullptr},
@@ -96,7 +99,7 @@ TEST_F(Session, TellsWhatHasChanged)
 	        [](auto& io_rSubject)
 	        {
 		        io_rSubject.m_Targets.push_back(io_rSubject.m_Targets[0]);
-		        io_rSubject.m_Targets[1].m_SegmentIndices.clear();
+		        io_rSubject.m_Targets[2].m_SegmentIndices.clear();
 	        },
 	        nullptr},
 	    {"a target of another performer",
@@ -122,10 +125,23 @@ TEST_F(Session, TellsWhatHasChanged)
 		}
 		for (std::size_t at = 0; (at = options.find(" \\\n  ", at)) != std::string::npos;)
 			options.erase(at, 4);
-		const std::string c_Before = "--position Pelvis:haunch";
+		const std::string c_Before = "--rotation Pelvis:haunch";
 		const std::size_t begin = options.find(c_Before) + c_Before.size();
 		EXPECT_EQ(options.substr(begin, options.find(" -o ") - begin), rRow.m_pOptions) << options;
 	}
+}
+
+TEST_F(Session, TellsSegmentsOfOneNameApart)
+{
+	Make();
+	const auto source = m_Document.SourceValues();
+	VSubjectParametrised subject = *source.m_pParametrised;
+	subject.m_Segments[1].m_Name = subject.m_Segments[0].m_Name;
+	m_Document.SetSourceSubject(subject, *source.m_pApplicationData);
+	m_Document.AddTarget(1, 1, false, false);
+	const std::string options = m_Document.SessionCommands().toStdString();
+	EXPECT_NE(options.find("--rotation '#0:loin'"), std::string::npos) << options;
+	EXPECT_NE(options.find("--expressions 2="), std::string::npos) << "since it was measured to the other one";
 }
 
 TEST_F(Session, BeginsWithAFile)

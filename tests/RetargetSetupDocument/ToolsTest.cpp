@@ -243,10 +243,17 @@ TEST_F(Tools, AlignWhatTargetsTie)
 	EXPECT_TRUE(m_Document.IsAligning());
 	m_Document.EndAlignment(false);
 	EXPECT_EQ(m_Document.GetTargetScale(), 1.0);
-	// There is no way but by joints that turn every way.
-	Edit([](VSubjectParametrised& io_rSubject)
-	    { io_rSubject.m_Segments[23].m_Joint.m_JointType = VSubjectParametrised::VJoint::EHinge; });
-	EXPECT_EQ(aligned(false), "");
+	// The performer's elbow.
+	Edit([&](VSubjectParametrised& io_rSubject)
+	    { io_rSubject.m_Segments[23].m_Joint = m_Document.SourceValues().m_pParametrised->m_Segments[9].m_Joint; });
+	EXPECT_EQ(aligned(false), "22 stays: it is locked|23 stays: it has no joint that turns every way|") << TakeTold();
+	m_Document.EndAlignment(true);
+	SetSmallSubjects();
+	for (int i = 0; i < 5; ++i)
+		m_Document.AddTarget(i, i, true, false);
+	const QVariantMap small = m_Document.AlignToSource(all, {}, true, false);
+	EXPECT_EQ(small["scale"], 1.0) << "without feet there is nothing to scale it by";
+	EXPECT_EQ(small["heights"], "");
 }
 
 } // namespace
