@@ -259,10 +259,17 @@ TEST_F(ScaleSubject, RefusesWithNothingChanged)
 	m_Subject.m_Segments[0].m_PreTranslation = {"Arm", "1+GS", ""};
 	m_Subject.m_DynamicParameters = {{"GS", 1, 0, 1, true}};
 	const VSubjectParametrised before = m_Subject;
+	VSubject evaluated;
+	evaluated.m_Segments.resize(1);
+	evaluated.m_Segments[0].m_PreTranslation = {1, 2, 3};
+	const VSubject evaluatedBefore = evaluated;
 	for (const double factor : {0.0, -1.0, std::nan(""), HUGE_VAL})
 	{
 		EXPECT_FALSE(SubjectParametrisedUtils::ScaleSubject(m_Subject, factor));
 		EXPECT_EQ(m_Log.TakeTroubles().size(), 1u);
+		EXPECT_FALSE(TemplateSubjectUtils::ScaleSubject(evaluated, factor));
+		EXPECT_EQ(m_Log.TakeTroubles().size(), 1u);
+		EXPECT_TRUE(evaluated == evaluatedBefore);
 	}
 	EXPECT_FALSE(SubjectParametrisedUtils::ScaleSubject(m_Subject, 1e10));
 	const VTexts log = m_Log.TakeTroubles();

@@ -2,6 +2,8 @@
 
 #include "Rows.h"
 
+#include "SetupProposal/BodyParts.h"
+#include "SetupProposal/NameWords.h"
 #include "SetupProposal/Partner.h"
 #include "SetupProposal/PoseCheck.h"
 
@@ -9,6 +11,7 @@
 #include <fstream>
 #include <map>
 #include <numbers>
+#include <numeric>
 #include <set>
 #include <tuple>
 
@@ -416,6 +419,8 @@ void FindInRig(const VRig& i_rRig, std::map<std::string, VFigures>& io_rFigures)
 			const std::string what = i_rRig.m_Name + ", " + rFamily.m_pName + ", " + rVariation.m_pName;
 			const VFigures figures =
 			    FiguresOf(SetupProposal::Propose(mapped.m_Source, skeleton), mapped.m_Source, named, truePairs, what);
+			for (const SetupProposal::VJointReading& rReading : SetupProposal::ReadBody(skeleton).m_Joints)
+				ASSERT_NEAR(std::reduce(rReading.m_Likely.begin(), rReading.m_Likely.end()), 1.0, 1e-9) << what;
 			const auto [right, found] = LeastOf(rFamily, rVariation);
 			if (figures.m_Proposed > 0 || found > 0.0)
 			{
@@ -443,6 +448,17 @@ TEST(Map, FindsThePairsWhateverTheNamesTheTreeAndTheFacing)
 	}
 	EXPECT_GE(all.Precision(), 0.97);
 	EXPECT_GE(all.Found(), 0.9);
+}
+
+/// A word that is known stays whole, though it begins as the others' prefix does.
+TEST(Map, TakesAGluedPrefixOffNames)
+{
+	std::string words;
+	for (const SetupProposal::VNameWords& rName :
+	    SetupProposal::WordsOf({"hepelvis", "hespine", "hechest", "heneck", "head", "hethigh", "heknee", "hefoot"}))
+		for (const std::string& rWord : rName.m_Words)
+			words += rWord + " ";
+	EXPECT_EQ(words, "pelvis spine chest neck head thigh knee foot ");
 }
 
 TEST(Map, TellsWhoWasOutvoted)
