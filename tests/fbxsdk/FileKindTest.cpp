@@ -1,6 +1,7 @@
 #include "fbxsdk/container/FileKind.h"
 
 #include "FbxFileBuilder.h"
+#include "fbxsdk/sdk/Manager.h"
 
 #include <gtest/gtest.h>
 
@@ -58,5 +59,18 @@ INSTANTIATE_TEST_SUITE_P(Rows, FileKind,
         VRow{"Xml", "<?xml version=\"1.0\"?>", EFileKind::None},
         VRow{"Zeros", std::string(100, '\0'), EFileKind::None}),
     [](const auto& i_rInfo) { return i_rInfo.param.m_pName; });
+
+TEST(FileFormat, IsOfFilesThatAreOne)
+{
+	fbxsdk::FbxManager* const pManager = fbxsdk::FbxManager::Create();
+	const auto* const pRegistry = pManager->GetIOPluginRegistry();
+	int format = -1;
+	EXPECT_TRUE(pRegistry->DetectReaderFileFormat(RETARGET_SOURCE "/demo/character.fbx", format));
+	EXPECT_GE(format, 0);
+	for (const char* const pOther : {"/demo/performer.qrs", "/demo/none.fbx", "/demo"})
+		EXPECT_FALSE(pRegistry->DetectReaderFileFormat((std::string(RETARGET_SOURCE) + pOther).c_str(), format))
+		    << pOther;
+	pManager->Destroy();
+}
 
 } // namespace

@@ -83,6 +83,16 @@ TEST_F(Program, TakesAPicture)
 	EXPECT_EQ(
 	    settings.value("Store/RetargetSetup/TargetFBX").toString(), "String " RETARGET_SOURCE "/demo/character.fbx");
 	EXPECT_FALSE(QFileInfo::exists(Path(".config/RetargetSetup"))) << "the user's own settings are left alone";
+
+	EXPECT_EQ(Run(Picture({"--size", "1400x900", "--open", "preferences"}, "preferences.png")), 0);
+	const QImage withDialog(Path("preferences.png"));
+	ASSERT_EQ(withDialog.size(), picture.size());
+	// What is in it, not only its frame.
+	int changed = 0;
+	for (int y = 0; y < picture.height(); ++y)
+		for (int x = 0; x < picture.width(); ++x)
+			changed += picture.pixel(x, y) != withDialog.pixel(x, y);
+	EXPECT_GT(changed, 50000);
 }
 
 TEST_F(Program, FailsWithItsReason)

@@ -181,6 +181,12 @@ TEST_F(Window, TakesDroppedFilesByKind)
 	dialog.setModal(true);
 	dialog.show();
 	EXPECT_FALSE(Drop({c_Source})) << "a dialog is answered first";
+	QLineEdit field(&dialog);
+	QMimeData text;
+	text.setText("a");
+	QDragEnterEvent enter({1, 1}, Qt::CopyAction, &text, Qt::LeftButton, {});
+	QApplication::sendEvent(&field, &enter);
+	EXPECT_TRUE(enter.isAccepted()) << "what comes over a field of it is the field's";
 	dialog.hide();
 	EXPECT_TRUE(Drop({target, note, c_Fbx, c_Source}));
 	EXPECT_EQ(m_Marked,

@@ -75,6 +75,9 @@ TEST_F(Dialogs, JudgesProposedTargets)
 		ASSERT_EQ(selection().size(), 2u);
 		EXPECT_EQ(Names("sourceSegments").value(int(selection()[0].m_ElementIndex)), "L_Humerus");
 		EXPECT_EQ(Names("targetSegments").value(int(selection()[1].m_ElementIndex)), "upperArmLeft");
+		for (int row = 0; row < rTable.rowCount(); ++row)
+			rTable.item(row, 0)->setCheckState(Qt::Unchecked);
+		EXPECT_FALSE(rDialog.findChild<QWidget*>("ProposeAdd")->isEnabled()) << "nothing is ticked";
 		press(rDialog, "ProposeCancel");
 		EXPECT_EQ(Targets(), 0);
 		EXPECT_EQ(selection(), before);
