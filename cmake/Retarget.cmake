@@ -156,8 +156,16 @@ function(retarget_test name)
 	else()
 		target_precompile_headers(test_${name} REUSE_FROM TestMain)
 	endif()
+	set(threads "")
+	if(RETARGET_SANITIZE MATCHES "thread")
+		# The driver draws without threads of its own, which ThreadSanitizer does not know to wait for each other. What is
+		# seen of Qt's own threads is told apart from what is ours by setup/checks/races.
+		string(CONCAT threads "LP_NUM_THREADS=0;TSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/threads.supp"
+			" exitcode=0 log_path=${CMAKE_BINARY_DIR}/races/${name}")
+	endif()
 	if(NOT arg_DISPLAY)
 		add_test(NAME ${name} COMMAND test_${name})
+		set_tests_properties(${name} PROPERTIES ENVIRONMENT "${threads}")
 		return()
 	endif()
 	if(RETARGET_SANITIZE)
@@ -165,13 +173,6 @@ function(retarget_test name)
 	endif()
 	retarget_screen(screen ${name} 1920x1200)
 	add_test(NAME ${name} COMMAND ${screen} $<TARGET_FILE:test_${name}>)
-	set(threads "")
-	if(RETARGET_SANITIZE MATCHES "thread")
-		# The driver draws without threads of its own, which ThreadSanitizer does not know to wait for each other.
-		# What is seen of Qt's own threads is told apart from what is ours by setup/checks/races.
-		string(CONCAT threads "LP_NUM_THREADS=0;TSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/threads.supp"
-			" exitcode=0 log_path=${CMAKE_BINARY_DIR}/races/${name}")
-	endif()
 	# XCB copies texts that do not end in a zero, with their length: the strict checks take that for an overflow. Without
 	# a word about the session's bus Qt would try to start one, in a thread that may be in the midst of it at the end.
 	set_tests_properties(${name} PROPERTIES ENVIRONMENT
