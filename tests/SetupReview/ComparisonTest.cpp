@@ -5,6 +5,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
+
 namespace
 {
 
@@ -135,6 +137,32 @@ TEST(Comparison, AnotherOrderIsTold)
 	const auto changes = SetupReview::CompareSetups(setup, other);
 	ASSERT_EQ(changes.size(), 1u);
 	EXPECT_EQ(SetupReview::ChangeLine(changes[0]), "subject: the targets stand in another order");
+}
+
+/// A root says only what it did: turned, moved, or both.
+TEST(Comparison, APoseIsToldAsItDiffers)
+{
+	VSetup setup = Sound();
+	VSubjectParametrised::VJoint& rRoot = setup.m_Record.m_SubjectParametrised.m_Segments[0].m_Joint;
+	rRoot.m_JointType = VSubjectParametrised::VJoint::EFree;
+	rRoot.m_Mean = rRoot.m_BindPose = {0, 0, 0, 10, 20, 1000};
+	const struct
+	{
+		std::vector<double> m_Pose;
+		const char* m_pWords;
+	} rows[] = {{{0, 0, 0, 10, 50, 1040}, "segment \"Segment0\": bind pose and mean moved by 50.0 mm"},
+	    {{0, 0, std::acos(0.0), 10, 20, 1000}, "segment \"Segment0\": bind pose and mean turned by 90.0 degrees"},
+	    {{0, std::acos(0.0), 0, 10, 20, 1007},
+	        "segment \"Segment0\": bind pose and mean turned by 90.0 degrees and moved by 7.0 mm"}};
+	for (const auto& rRow : rows)
+	{
+		VSetup other = setup;
+		VSubjectParametrised::VJoint& rOther = other.m_Record.m_SubjectParametrised.m_Segments[0].m_Joint;
+		rOther.m_Mean = rOther.m_BindPose = rRow.m_Pose;
+		const auto changes = SetupReview::CompareSetups(setup, other);
+		ASSERT_EQ(changes.size(), 1u);
+		EXPECT_EQ(SetupReview::ChangeLine(changes[0]), rRow.m_pWords);
+	}
 }
 
 } // namespace

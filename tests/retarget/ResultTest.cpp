@@ -375,12 +375,14 @@ HIDDEN="false"/>
 ROTATION-OBSERVATION="base" HIDDEN="false"/>
 <TargetLocalPointToWorldPoint NAME="post" MARKER="Q" SEGMENT="bent" POSITION="3 0 -2" WEIGHT="1" HIDDEN="false">
 <TargetLocalPointToWorldPointTemplate/></TargetLocalPointToWorldPoint>
+<TargetLocalPlaneToWorldPoint NAME="flat" MARKER="P" SEGMENT="root" ORIGIN="0 0 60" NORMAL="0 0 0" WEIGHT="1"
+HIDDEN="false"><TargetLocalPlaneToWorldPointTemplate/></TargetLocalPlaneToWorldPoint>
 </Targets></TargetSet></KinematicModel>)");
 
 	const VRun run = folder.Run({"targets", "kinds.qrr", "--source", "source.qrs", "--json"});
 	EXPECT_EQ(run.m_Status, 0) << run.m_Err;
 	const VJson targets = VJson::parse(run.m_Out, nullptr, false);
-	ASSERT_EQ(targets.size(), 8u);
+	ASSERT_EQ(targets.size(), 9u);
 	struct VRow
 	{
 		const char* m_pName;
@@ -395,7 +397,8 @@ ROTATION-OBSERVATION="base" HIDDEN="false"/>
 	    {VRow{"plane", 40.0, {}, 40.0}, VRow{"line", 50.0, {}, 50.0}, VRow{"body: the worst marker", 3.0, {}, 3.0},
 	        VRow{"body with an unknown marker", {}, {}, {}}, VRow{"rotation", {}, 90.0 / M_PI, 90.0 / M_PI},
 	        VRow{"direction", {}, {}, {}}, VRow{"rotation with an axis", {}, 90.0, behindAxis},
-	        VRow{"point behind a post pose", 3.0, {}, std::hypot(3.0, 18.0)}})
+	        VRow{"point behind a post pose", 3.0, {}, std::hypot(3.0, 18.0)},
+	        VRow{"plane without a direction", {}, {}, {}}})
 	{
 		SCOPED_TRACE(rRow.m_pName);
 		const VJson& rTarget = targets[i++];
