@@ -18,11 +18,6 @@ class History : public VDocumentTest
 protected:
 	History() { m_Document.KeepHistory(m_Host.GetSelectionManager()); }
 
-	QUrl Url(const char* i_pName) const
-	{
-		return QUrl::fromLocalFile(QString::fromStdString((m_Folder / i_pName).string()));
-	}
-
 	/// The names of all that can be undone, the next first; all of it is done again.
 	std::string Names()
 	{

@@ -12,16 +12,9 @@ class CommandIgnored : public VDocumentTest
 protected:
 	CommandIgnored()
 	{
-		QObject::connect(&m_Document, &VRetargetSetup::commandIgnored,
-		    [this](const QString& i_rCommand, const QString& i_rReason)
-		    { m_Told += (i_rCommand + ": " + i_rReason).toStdString(); });
 		QObject::connect(&m_Document, &VRetargetSetup::targetSubjectLoaded,
 		    [this](const QUrl& i_rUrl) { m_Told += "loaded " + i_rUrl.toString().toStdString(); });
 	}
-
-	std::string Take() { return std::exchange(m_Told, {}); }
-	std::string File(const char* i_pName) const { return (m_Folder / i_pName).string(); }
-	QUrl Url(const char* i_pName) const { return QUrl::fromLocalFile(QString::fromStdString(File(i_pName))); }
 
 	void BreakTree(VSubjectParametrised i_Subject, bool i_bSource)
 	{
@@ -29,9 +22,6 @@ protected:
 		const auto data = *m_Document.TargetValues().m_pApplicationData;
 		i_bSource ? m_Document.SetSourceSubject(i_Subject, data) : void(m_Document.SetTargetSubject(i_Subject, data));
 	}
-
-private:
-	std::string m_Told;
 };
 
 constexpr const char* c_NoSource = "There is no source subject. Choose a source skeleton first.";
@@ -179,9 +169,9 @@ TEST_F(CommandIgnored, EachEndWithoutAChangeSaysWhy)
 		rRow.m_SetUp();
 		const auto pBefore = m_Document.TargetValues().m_pParametrised;
 		m_Changes = 0;
-		Take();
+		TakeTold();
 		rRow.m_Command();
-		EXPECT_EQ(Take(), rRow.m_pCommand + (": " + rRow.m_Reason));
+		EXPECT_EQ(TakeTold(), rRow.m_pCommand + (": " + rRow.m_Reason));
 		EXPECT_EQ(m_Document.TargetValues().m_pParametrised, pBefore);
 		EXPECT_EQ(m_Changes, 0);
 	}
@@ -207,7 +197,7 @@ TEST_F(CommandIgnored, ByPresetsThatCannotBeRead)
 		Put(m_Folder / "a.json", text);
 		EXPECT_TRUE(m_Document.FitPreset(Url("a.json"), 0.5).isEmpty());
 		const std::string told = "FitPreset: '" + File("a.json") + "', line " + reason;
-		EXPECT_EQ(Take().substr(0, told.size()), told) << text;
+		EXPECT_EQ(TakeTold().substr(0, told.size()), told) << text;
 	}
 	Put(m_Folder / "a.json",
 	    R"({"pairs": [{"source": "Hips", "target": "pelvis", "comment": "the root"}, {"source": "x", "target": "y"}]})");
@@ -231,11 +221,11 @@ TEST_F(CommandIgnored, NotByCommandsThatDoTheirWork)
 	m_Document.SaveTargetSubjectURL(Url("a.qrr"));
 	ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
 	m_Document.CreateTargetSubject();
-	EXPECT_EQ(Take(), "");
+	EXPECT_EQ(TakeTold(), "");
 	m_Document.LoadTargetSubject(m_Folder / "a.qrr");
-	EXPECT_EQ(Take(), "") << "not the operator's command";
+	EXPECT_EQ(TakeTold(), "") << "not the operator's command";
 	m_Document.LoadTargetSubjectURL(Url("a.qrr"));
-	EXPECT_EQ(Take(), "loaded " + Url("a.qrr").toString().toStdString());
+	EXPECT_EQ(TakeTold(), "loaded " + Url("a.qrr").toString().toStdString());
 }
 
 TEST_F(CommandIgnored, AFileIsToldAsLoadedAfterTheDocumentHasIt)
@@ -252,7 +242,7 @@ TEST_F(CommandIgnored, AFileIsToldAsLoadedAfterTheDocumentHasIt)
 	    });
 	m_Document.LoadTargetSubjectURL(Url("a.qrr"));
 	EXPECT_EQ(dummies, 0u);
-	EXPECT_EQ(Take(), "loaded " + Url("a.qrr").toString().toStdString());
+	EXPECT_EQ(TakeTold(), "loaded " + Url("a.qrr").toString().toStdString());
 }
 
 } // namespace

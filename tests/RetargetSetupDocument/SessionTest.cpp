@@ -16,13 +16,7 @@ using VJoint = VSubjectParametrised::VJoint;
 class Session : public VDocumentTest
 {
 protected:
-	Session()
-	{
-		m_Document.KeepHistory(m_Host.GetSelectionManager());
-		QObject::connect(&m_Document, &VRetargetSetup::commandIgnored,
-		    [this](const QString& i_rCommand, const QString& i_rReason)
-		    { m_Told = (i_rCommand + ": " + i_rReason).toStdString(); });
-	}
+	Session() { m_Document.KeepHistory(m_Host.GetSelectionManager()); }
 
 	void Make()
 	{
@@ -32,13 +26,6 @@ protected:
 		m_Document.AddTarget(0, 0, true, false);
 		m_Document.AddTarget(0, 0, false, false);
 	}
-
-	std::string File(const char* i_pName) const { return (m_Folder / i_pName).string(); }
-	QUrl Url(const char* i_pName) const { return QUrl::fromLocalFile(QString::fromStdString(File(i_pName))); }
-	std::string TakeTold() { return std::exchange(m_Told, {}); }
-
-private:
-	std::string m_Told;
 };
 
 constexpr const char* c_Gone =

@@ -7,6 +7,8 @@
 
 #include <gtest/gtest.h>
 
+#include <utility>
+
 /// A document in an in-memory host, and a folder of its own for files.
 class VDocumentTest : public testing::Test
 {
@@ -14,7 +16,16 @@ protected:
 	VDocumentTest()
 	{
 		m_Document.GetChangedSignal().Connect([this] { ++m_Changes; });
+		QObject::connect(&m_Document, &VRetargetSetup::commandIgnored,
+		    [this](const QString& i_rCommand, const QString& i_rReason)
+		    { m_Told += (i_rCommand + ": " + i_rReason).toStdString(); });
 	}
+
+	/// What the document has told since of commands that it ignored.
+	std::string TakeTold() { return std::exchange(m_Told, {}); }
+
+	std::string File(const char* i_pName) const { return (m_Folder / i_pName).string(); }
+	QUrl Url(const char* i_pName) const { return QUrl::fromLocalFile(QString::fromStdString(File(i_pName))); }
 
 	CoreOrlexTypes::VSubjectParametrised Target() const
 	{
@@ -46,4 +57,5 @@ protected:
 	InMemoryHost::VPluginContext m_Host;
 	VRetargetSetup m_Document{m_Host.GetDispatcher(), m_Host.GetFrameFactory(), m_Host.GetItemFactory()};
 	int m_Changes = 0;
+	std::string m_Told;
 };

@@ -16,13 +16,6 @@ using CoreOrlexTypes::VSubjectParametrised;
 class Tools : public VDocumentTest
 {
 protected:
-	Tools()
-	{
-		QObject::connect(&m_Document, &VRetargetSetup::commandIgnored,
-		    [this](const QString& i_rCommand, const QString& i_rReason)
-		    { m_Told = (i_rCommand + ": " + i_rReason).toStdString(); });
-	}
-
 	void Make()
 	{
 		ASSERT_TRUE(m_Document.LoadTargetFBX(RETARGET_SOURCE "/demo/character.fbx"));
@@ -45,14 +38,6 @@ protected:
 		i_bSource ? m_Document.SetSourceSubject(subject, *values.m_pApplicationData)
 		          : void(m_Document.SetTargetSubject(subject, *values.m_pApplicationData));
 	}
-
-	QUrl Url(const char* i_pName) const
-	{
-		return QUrl::fromLocalFile(QString::fromStdString((m_Folder / i_pName).string()));
-	}
-	std::string TakeTold() { return std::exchange(m_Told, {}); }
-
-	std::string m_Told;
 };
 
 TEST_F(Tools, FitPresetsByNamesAndByWhatIsProposed)
@@ -79,8 +64,7 @@ TEST_F(Tools, FitPresetsByNamesAndByWhatIsProposed)
 	    "\"wing\" and \"cape1\": the source has no segment \"wing\", and nothing is proposed in its place");
 	Put(m_Folder / "a.json", R"({"fbx": "a.fbx"})");
 	EXPECT_TRUE(m_Document.FitPreset(Url("a.json"), 0.5).isEmpty());
-	EXPECT_EQ(TakeTold(),
-	    "FitPreset: '" + (m_Folder / "a.json").string() + "', line 1: \"fbx\" does not belong into a preset");
+	EXPECT_EQ(TakeTold(), "FitPreset: '" + File("a.json") + "', line 1: \"fbx\" does not belong into a preset");
 }
 
 TEST_F(Tools, SaveWhatAPresetCanHold)
