@@ -187,8 +187,7 @@ TEST_F(Tools, LookAtAnotherPerformerOrFile)
 	Rename(true, 1, "Stick");
 	EXPECT_EQ(texts(true),
 	    "|The new performer has no segment \"LeftArm\", and none was found in its place: the targets that follow it "
-	    "keep "
-	    "its name, and follow nothing|||0");
+	    "keep its name, and follow nothing|||0");
 
 	VRetargetSetup other(m_Host.GetDispatcher(), m_Host.GetFrameFactory(), m_Host.GetItemFactory());
 	std::string told;
