@@ -138,6 +138,8 @@ TEST(StoredValue, CountsAreBoundedBeforeMemoryIsReserved)
 	EXPECT_FALSE(FromVariant({pEmpties, most}, targets));
 	EXPECT_TRUE(FromVariant({pEmpties, std::string("\3\0\0\0", 4)}, targets));
 	EXPECT_EQ(targets.size(), 3u);
+	EXPECT_TRUE(FromVariant({pEmpties, std::string("\0\x10\0\0", 4)}, targets));
+	EXPECT_FALSE(FromVariant({pEmpties, std::string("\1\x10\0\0", 4)}, targets));
 	EXPECT_TRUE(ValueText({pEmpties, most}).ends_with("..."));
 	EXPECT_LT(ValueText({pEmpties, most}).size(), 2 * c_MaxTextBytes);
 }

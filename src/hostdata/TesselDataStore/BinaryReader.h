@@ -64,12 +64,15 @@ public:
 	/// The count of a list's elements.
 	/// @param i_MinimumSize of an element in bytes: a count that cannot fit what is left throws.
 	/// @param i_SizeInMemory that an element will take.
-	/// @return false if all lists together would take more memory than c_MaxElementBytes.
+	/// @return false if all lists together would take more memory than c_MaxElementBytes, or if more than
+	/// c_MaxEmptyElements take no bytes.
 	bool Count(std::uint64_t i_MinimumSize, std::size_t i_SizeInMemory, std::uint32_t& o_rCount)
 	{
 		o_rCount = Number<std::uint32_t>();
 		if (i_MinimumSize != 0 && o_rCount > BytesLeft() / i_MinimumSize)
 			Take(UINT64_MAX);
+		if (i_MinimumSize == 0 && o_rCount > TesselDataStore::c_MaxEmptyElements)
+			return false;
 		if (std::uint64_t(o_rCount) * i_SizeInMemory > m_ElementBytesLeft)
 			return false;
 		m_ElementBytesLeft -= std::uint64_t(o_rCount) * i_SizeInMemory;
