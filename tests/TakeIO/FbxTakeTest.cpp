@@ -140,11 +140,11 @@ TEST(FbxTake, OfAnOldFileIsRead)
 	}
 }
 
-/// Weights of 1 are 9999, two in one number; as text its bits are printed as a whole number.
+/// Weights of 1 are 9999, two in one number; as text its bits are printed as a whole number. There are none above 1.
 TEST(FbxCurve, WeightedSlopesBendTime)
 {
-	const std::uint32_t weights = 0x270F0000u >> 16 | 0x270F0000u;
-	for (const bool bText : {false, true})
+	for (const auto& [bText, weights] :
+	    {std::pair(false, 0x270F270Fu), std::pair(true, 0x270F270Fu), std::pair(false, 0x4E204E20u)})
 	{
 		const double packed = bText ? double(weights) : double(std::bit_cast<float>(weights));
 		const std::string bytes = Write(c_Forms[bText ? 4 : 1], {CurveRecord(1, {0x03000408}, {2, 2, packed, 0})});

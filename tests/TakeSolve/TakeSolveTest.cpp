@@ -183,6 +183,9 @@ TEST(SolveReport, TellsWhatWasSpoilt)
 	ASSERT_EQ(fine.m_Bends.size(), 4u);
 	for (const auto& rBend : fine.m_Bends)
 		EXPECT_LT(rBend.m_Flexion + rBend.m_Axis, 1e-5) << rBend.m_Name;
+	TakeSolve::VSolveReport none;
+	EXPECT_TRUE(
+	    TakeSolve::ReportOn(scene.m_Target, scene.m_Performer.m_BindPose, *scene.m_pMotion, VSolvedTake(), {}, none));
 	EXPECT_TRUE(fine.m_Jumps.empty() && fine.m_NotConverged.empty() && fine.m_Ranges.empty() && fine.m_Sides.empty());
 	for (const auto& rPose : fine.m_BindPoses)
 		EXPECT_TRUE(rPose.m_bFine) << rPose.m_Message;

@@ -529,6 +529,16 @@ TEST(Map, ProposesNothingForWhatIsNoBody)
 		EXPECT_FALSE(proposal.m_Alternatives.empty()) << "what is left to the operator";
 		EXPECT_NE(proposal.m_NoBody.find("stands on four legs"), std::string::npos) << proposal.m_NoBody;
 	}
+	// Knees far in front of the hips are no second pair of legs.
+	VRestSkeleton crouching{
+	    {"Hips", -1, {0.0, 0.0, 900.0}}, {"Spine", 0, {0.0, 0.0, 1200.0}}, {"Head", 1, {0.0, 0.0, 1500.0}}};
+	for (const auto& [side, x] : {std::pair("Left", 100.0), std::pair("Right", -100.0)})
+		for (const auto& [name, y, z] : {std::tuple("Thigh", 0.0, 880.0), std::tuple("Shin", -420.0, 600.0),
+		         std::tuple("Foot", -400.0, 60.0), std::tuple("Toe", -470.0, 20.0)})
+			crouching.push_back(
+			    {std::string(side) + name, y == 0.0 ? std::int64_t(0) : std::int64_t(crouching.size()) - 1, {x, y, z}});
+	EXPECT_EQ(SetupProposal::Propose(performer, crouching).m_NoBody, "");
+
 	RunRows({{"a prop", {"map", "--source", c_Performer, "--fbx", Data("fbx/ufbx_maya_transformed_skin_a6100.fbx")}, 0,
 	             "neither arms nor legs on both sides", ""},
 	    {"a prop is not tied",
