@@ -117,6 +117,16 @@ TEST(Reader, WhatIsNotFbxIsRefused)
 		EXPECT_EQ(loaded.m_Messages,
 		    (VMessages{"2 Call to KFbxImporter::Initialize() failed.", "2 Error returned: "s + text}));
 	}
+	// It takes no room.
+	const VTestFolder folder;
+	const boost::filesystem::path large = folder / "large.fbx";
+	Put(large, "");
+	boost::filesystem::resize_file(large, (std::uint64_t(2) << 30) + 1);
+	VTestLog log("FBXIO");
+	FBXReader reader;
+	EXPECT_FALSE(reader.LoadFile(large.string()));
+	const VMessages told = log.Take();
+	EXPECT_EQ(std::ranges::count(told, "2 Error returned: File is larger than 2 GiB"), 1);
 }
 
 TEST(Reader, OtherVersionsAreRefusedWithTheirNumbers)

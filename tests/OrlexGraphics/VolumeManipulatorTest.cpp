@@ -181,6 +181,14 @@ TEST_P(VolumeManipulator, APressDragsTheHandleThatIsPointedAt)
 	m_pManipulator->SetVolume(c_Volume);
 	EXPECT_EQ(m_pManipulator->Volume(), c_Volume);
 
+	m_pManipulator->Press(m_Camera, {280, 150});
+	m_pManipulator->Drag(m_Camera, {290, 150}, {});
+	m_pManipulator->Cancel();
+	EXPECT_FALSE(m_pManipulator->IsDragging());
+	EXPECT_TRUE(m_pSelection->Selection().Items().empty());
+	EXPECT_EQ(m_pManipulator->Volume(), c_Volume);
+	EXPECT_EQ(changes.back(), c_Volume);
+
 	// Another volume's handle is not this one's.
 	NVX::ISelectionItem other = handle;
 	other.m_Name = "Other";

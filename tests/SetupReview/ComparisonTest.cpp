@@ -139,29 +139,38 @@ TEST(Comparison, AnotherOrderIsTold)
 	EXPECT_EQ(SetupReview::ChangeLine(changes[0]), "subject: the targets stand in another order");
 }
 
-/// A root says only what it did: turned, moved, or both.
+/// A root says only what it did: turned, moved, or both. Other joints do one of them.
 TEST(Comparison, APoseIsToldAsItDiffers)
 {
-	VSetup setup = Sound();
-	VSubjectParametrised::VJoint& rRoot = setup.m_Record.m_SubjectParametrised.m_Segments[0].m_Joint;
-	rRoot.m_JointType = VSubjectParametrised::VJoint::EFree;
-	rRoot.m_Mean = rRoot.m_BindPose = {0, 0, 0, 10, 20, 1000};
+	using VJoint = VSubjectParametrised::VJoint;
+	const double right = std::acos(0.0);
 	const struct
 	{
-		std::vector<double> m_Pose;
+		VJoint::EJointType m_Type;
+		std::vector<double> m_Before;
+		std::vector<double> m_After;
 		const char* m_pWords;
-	} rows[] = {{{0, 0, 0, 10, 50, 1040}, "segment \"Segment0\": bind pose and mean moved by 50.0 mm"},
-	    {{0, 0, std::acos(0.0), 10, 20, 1000}, "segment \"Segment0\": bind pose and mean turned by 90.0 degrees"},
-	    {{0, std::acos(0.0), 0, 10, 20, 1007},
-	        "segment \"Segment0\": bind pose and mean turned by 90.0 degrees and moved by 7.0 mm"}};
+	} rows[] = {{VJoint::EFree, {0, 0, 0, 10, 20, 1000}, {0, 0, 0, 10, 50, 1040}, "moved by 50.0 mm"},
+	    {VJoint::EFree, {0, 0, 0, 10, 20, 1000}, {0, 0, right, 10, 20, 1000}, "turned by 90.0 degrees"},
+	    {VJoint::EFree, {0, 0, 0, 10, 20, 1000}, {0, right, 0, 10, 20, 1007},
+	        "turned by 90.0 degrees and moved by 7.0 mm"},
+	    {VJoint::EBall, {0, 0, 0}, {right, 0, 0}, "turned by 90.0 degrees"},
+	    {VJoint::EHardySpicer, {0.25, 0}, {0, right}, "turned by 90.0 degrees"},
+	    {VJoint::EHinge, {0}, {-right}, "turned by 90.0 degrees"}, {VJoint::ESlider, {3}, {-4}, "moved by 7.0 mm"}};
 	for (const auto& rRow : rows)
 	{
-		VSetup other = setup;
-		VSubjectParametrised::VJoint& rOther = other.m_Record.m_SubjectParametrised.m_Segments[0].m_Joint;
-		rOther.m_Mean = rOther.m_BindPose = rRow.m_Pose;
-		const auto changes = SetupReview::CompareSetups(setup, other);
-		ASSERT_EQ(changes.size(), 1u);
-		EXPECT_EQ(SetupReview::ChangeLine(changes[0]), rRow.m_pWords);
+		const auto posed = [&](const std::vector<double>& i_rPose)
+		{
+			VSetup setup = Sound();
+			VJoint& rJoint = setup.m_Record.m_SubjectParametrised.m_Segments[0].m_Joint;
+			rJoint.m_JointType = rRow.m_Type;
+			rJoint.m_Mean = rJoint.m_BindPose = i_rPose;
+			return setup;
+		};
+		const auto changes = SetupReview::CompareSetups(posed(rRow.m_Before), posed(rRow.m_After));
+		ASSERT_EQ(changes.size(), 1u) << rRow.m_pWords;
+		EXPECT_EQ(SetupReview::ChangeLine(changes[0]),
+		    std::string("segment \"Segment0\": bind pose and mean ") + rRow.m_pWords);
 	}
 }
 

@@ -2,8 +2,10 @@
 #include "../fbxsdk/FbxFileBuilder.h"
 
 #include "TakeIO/FbxCurve.h"
+#include "TakeIO/FbxJoints.h"
 #include "TakeIO/ReadTake.h"
 #include "fbxsdk/container/FileKind.h"
+#include "fbxsdk/document/Document.h"
 
 #include <gtest/gtest.h>
 
@@ -408,6 +410,20 @@ TEST(FbxTake, CurvesThatAreDamagedAreRefused)
 	EXPECT_NEAR(LocalPose(take, 0, 2).t[0], 30.0, 1e-9);
 }
 
+TEST(FbxTake, RatesOfTheFileAreBounded)
+{
+	const std::tuple<double, double, double> rows[]{{11, 0, 24}, {14, 12.5, 12.5}, {14, 1e-3, 1e-3}, {14, 9e-4, 30},
+	    {14, 1e5, 1e5}, {14, 1.1e5, 30}, {14, 0, 30}, {19, 50, 50}, {-1, 50, 50}};
+	for (const auto& [mode, custom, rate] : rows)
+	{
+		const std::string bytes =
+		    Write(c_Forms[1], VTestScene{{}, {{"TimeMode", {mode}}, {"CustomFrameRate", {custom}}}, {}, {}});
+		FbxFormat::VElementTree tree;
+		ASSERT_TRUE(tree.Read(bytes, FbxFormat::DetectFileKind(bytes)));
+		EXPECT_EQ(ReadFbxSettings(FbxFormat::VDocument(tree)).m_Rate, rate) << mode << ' ' << custom;
+	}
+}
+
 TEST(FbxTake, ThatCannotBeReadIsRefused)
 {
 	const auto stop = [](double) { return false; };
@@ -418,6 +434,8 @@ TEST(FbxTake, ThatCannotBeReadIsRefused)
 	    {Write(c_Forms[0], VTestScene{}), {}, "It has no joints"},
 	    {"; FBX 5.8.0 project file\n", {}, "It is no FBX file of version 6 or 7"},
 	    {Write(c_Forms[1], VTestScene{}), {}, "It has no joints"},
+	    {Write(c_Forms[1], VTestScene{std::vector<VTestNode>(10'001, {"joint", "LimbNode", -1, {}}), {}, {}, {}}), {},
+	        "It has more than 10000 joints"},
 	    {Write(c_Forms[1], VTestScene{{{"hips", "LimbNode", -1, {}}}, {{"UpAxis", {0}}}, {}, {}}), {},
 	        "Its X axis points up, which is not read"},
 	    {TakeFile(c_Forms[1]), {{}, 0.0, {}, "walk"}, "Its unit is none"},

@@ -218,6 +218,12 @@ TEST(SolveReport, TellsWhatWasSpoilt)
 	std::string error;
 	leaning.m_pMotion =
 	    TakeSolve::VSourceMotion::Make(scene.m_Performer.m_Subject, scene.m_Performer.m_BindPose, pLeaning, {}, error);
+	// Frames are told by their numbers in the take.
+	VSolvedTake part = scene.Solved(10, 20);
+	part.m_States[4 * part.m_NumberOfStates + 5] -= 40.0;
+	for (const auto& rFoot : scene.Report(part).m_Feet)
+		EXPECT_EQ(rFoot.m_LowestFrame, 14u);
+
 	const TakeSolve::VSolveReport leans = leaning.Report(exact);
 	EXPECT_NEAR(leans.m_Feet[0].m_SourceLean, fine.m_Feet[0].m_SourceLean + 20.0 * c_Degree, 3.0 * c_Degree);
 	EXPECT_EQ(leans.m_Feet[1].m_SourceLean, fine.m_Feet[1].m_SourceLean);
