@@ -433,6 +433,18 @@ TEST_F(RigidBody, RemoveKeepsParametersThatAreUsedElsewhere)
 	}
 }
 
+TEST_F(RigidBody, RemoveLeavesASegmentThatAnotherTargetFollows)
+{
+	VTarget& rOther = m_Body.m_Targets.emplace_back();
+	rOther.m_Type = VTarget::ELocalPointToWorldPoint;
+	rOther.m_SegmentIndices = {0};
+	m_AppData.m_Targets.resize(2);
+	ASSERT_TRUE(RemoveRigidBody(m_Body, m_AppData, 0));
+	ASSERT_EQ(m_Body.m_Segments.size(), 1u);
+	ASSERT_EQ(m_Body.m_Targets.size(), 1u);
+	EXPECT_EQ(m_Body.m_Targets[0].m_SegmentIndices, std::vector<std::uint32_t>{0});
+}
+
 TEST_F(RigidBody, RemoveRefusesInOrder)
 {
 	const auto refuses = [&](std::size_t i_Target, const VTexts& i_rLog)

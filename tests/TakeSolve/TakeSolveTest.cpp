@@ -221,8 +221,13 @@ TEST(SolveReport, TellsWhatWasSpoilt)
 	// Frames are told by their numbers in the take.
 	VSolvedTake part = scene.Solved(10, 20);
 	part.m_States[4 * part.m_NumberOfStates + 5] -= 40.0;
-	for (const auto& rFoot : scene.Report(part).m_Feet)
-		EXPECT_EQ(rFoot.m_LowestFrame, 14u);
+	// In one of two frames the left foot's toes point down.
+	for (const auto& [frame, degrees] : {std::pair(6, 60.0), std::pair(8, -60.0)})
+		part.m_States[std::size_t(frame) * part.m_NumberOfStates + scene.State("LeftAnkle")] += degrees * c_Degree;
+	const TakeSolve::VSolveReport ofPart = scene.Report(part);
+	EXPECT_EQ(ofPart.m_Feet[1].m_LowestFrame, 14u);
+	EXPECT_NE(ofPart.m_Feet[0].m_LowestFrame, 14u);
+	EXPECT_LT(ofPart.m_Feet[0].m_Lowest, ofPart.m_Feet[1].m_Lowest - 20.0);
 
 	const TakeSolve::VSolveReport leans = leaning.Report(exact);
 	EXPECT_NEAR(leans.m_Feet[0].m_SourceLean, fine.m_Feet[0].m_SourceLean + 20.0 * c_Degree, 3.0 * c_Degree);

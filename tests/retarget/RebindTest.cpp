@@ -37,6 +37,15 @@ TEST_F(Rebind, TheSameFileChangesNothing)
 {
 	EXPECT_EQ(Changed("own.fbx")["changes"].size(), 0u);
 	EXPECT_EQ(m_Folder.Read("new.qrr"), m_Folder.Read("own.qrr"));
+	// Of two bones of one name each stays beneath its own hand.
+	m_Folder.Write("twins.fbx",
+	    replace_all_copy(
+	        replace_all_copy(m_Folder.Read("own.fbx"), "LeftHandIndex1", "HandIndex"), "RightHandIndex1", "HandIndex"));
+	ASSERT_EQ(m_Folder.Run({"-q", "create", "--fbx", "twins.fbx", "--source", c_Performer, "--auto", "-o", "twins.qrr"})
+	              .m_Status,
+	    0);
+	const VJson twins = RunJson({"-q", "rebind", "twins.qrr", "--fbx", "twins.fbx", "--json"}, m_Folder);
+	EXPECT_EQ(twins["changes"].size(), 0u) << twins["changes"];
 }
 
 TEST_F(Rebind, AnotherPrefixKeepsAll)
