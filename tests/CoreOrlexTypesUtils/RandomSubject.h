@@ -107,9 +107,13 @@ private:
 
 	std::vector<double> Definite(std::size_t i_Size)
 	{
-		std::vector<double> matrix(i_Size * i_Size, 0.25);
+		std::vector<double> matrix(i_Size * i_Size);
 		for (std::size_t i = 0; i < i_Size; ++i)
+		{
 			matrix[i * (i_Size + 1)] = double(i_Size + Below(8));
+			for (std::size_t j = 0; j < i; ++j)
+				matrix[i * i_Size + j] = matrix[j * i_Size + i] = 0.25 * (double((5 * i + 3 * j) % 7) - 3.0);
+		}
 		return matrix;
 	}
 

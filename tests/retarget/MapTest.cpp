@@ -4,6 +4,7 @@
 
 #include "SetupProposal/BodyParts.h"
 #include "SetupProposal/NameWords.h"
+#include "SetupProposal/PartWords.h"
 #include "SetupProposal/Partner.h"
 #include "SetupProposal/PoseCheck.h"
 
@@ -459,6 +460,13 @@ TEST(Map, TakesAGluedPrefixOffNames)
 		for (const std::string& rWord : rName.m_Words)
 			words += rWord + " ";
 	EXPECT_EQ(words, "pelvis spine chest neck head thigh knee foot ");
+}
+
+TEST(Map, OfTwoPartsInANameTheLastCounts)
+{
+	const auto scores = SetupProposal::PartsByName(SetupProposal::WordsOf("SpineNeck"));
+	ASSERT_TRUE(scores);
+	EXPECT_GT((*scores)[SetupProposal::ENeck], (*scores)[SetupProposal::ESpine]);
 }
 
 TEST(Map, TellsWhoWasOutvoted)
