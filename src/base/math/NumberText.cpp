@@ -101,8 +101,6 @@ bool AppendNotFinite(std::string& io_rText, double i_Value)
 	return true;
 }
 
-__extension__ using VWide = unsigned __int128;
-
 constexpr std::uint64_t PowerOf(std::uint64_t i_Base, int i_Exponent)
 {
 	return i_Exponent == 0 ? 1 : i_Base * PowerOf(i_Base, i_Exponent - 1);
@@ -116,6 +114,7 @@ constexpr std::uint64_t c_TenToDigits = PowerOf(10, c_RoundTripDigits);
 /// the point has at most 102 bits: all of it is exact.
 std::uint64_t RoundTripDigits(double i_Magnitude, int& o_rExponent)
 {
+	__extension__ using VWide = unsigned __int128;
 	constexpr auto c_Fives = []
 	{
 		std::array<std::uint64_t, c_RoundTripDigits + 5> fives{};
@@ -175,79 +174,20 @@ void AppendRoundTripDigits(std::string& io_rText, double i_Value)
 		(io_rText += '.').append(digits + whole, count - whole);
 }
 
-/// The highest power of ten that is a double, 10^22; its 5^22 has 52 bits.
-constexpr int c_MostFraction = 22;
-/// Of a number that 64 bits hold whatever its digits are.
-constexpr std::ptrdiff_t c_MostDigits = 19;
-
-/// i_Digits / 10^i_Fraction to the nearest double, ties to even: of two doubles that hold both exactly, or else by one
-/// exact division of integers, whose remainder only says on which side of a tie the quotient lies (Clinger, How to Read
-/// Floating Point Numbers Accurately, 1990).
-inline double Quotient(std::uint64_t i_Digits, int i_Fraction)
-{
-	struct VPower
-	{
-		double m_Ten = 1.0;
-		/// 5^k with its highest bit set, and how far it was moved for that.
-		std::uint64_t m_Five = std::uint64_t(1) << 63;
-		int m_Shift = 63;
-	};
-	constexpr auto c_Powers = []
-	{
-		std::array<VPower, c_MostFraction + 1> powers{};
-		for (int i = 1; i <= c_MostFraction; ++i)
-		{
-			const std::uint64_t five = PowerOf(5, i);
-			const int shift = std::countl_zero(five);
-			powers[std::size_t(i)] = {10.0 * powers[std::size_t(i) - 1].m_Ten, five << shift, shift};
-		}
-		return powers;
-	}();
-	const VPower& rPower = c_Powers[std::size_t(i_Fraction)];
-	if (i_Digits >> std::numeric_limits<double>::digits == 0)
-		return double(i_Digits) / rPower.m_Ten;
-	const int shift = std::countl_zero(i_Digits);
-	// Less than twice the divisor, times 2^63: the quotient has 63 or 64 bits.
-	const VWide dividend = VWide(i_Digits << shift) << 63;
-	const std::uint64_t quotient = std::uint64_t(dividend / rPower.m_Five);
-	const bool bRest = VWide(quotient) * rPower.m_Five != dividend;
-	const int exponent = rPower.m_Shift - shift - 63 - i_Fraction;
-	return double(quotient | std::uint64_t(bRest)) * std::bit_cast<double>(std::uint64_t(1023 + exponent) << 52);
-}
-
-/// Nearly every number is plain: digits that neither a mark of another base nor an exponent follows.
+/// Nearly every number is plain: digits that neither a mark of another base nor an exponent without digits follows.
 /// @return where such a number ends, null if none begins here.
 inline const char* ScanPlainReal(const char* i_pFrom, const char* i_pEnd, double& o_rValue)
 {
-	const bool bNegative = i_pFrom != i_pEnd && *i_pFrom == '-';
-	const char* p = bNegative ? i_pFrom + 1 : i_pFrom;
-	const char* const pDigits = p;
-	std::uint64_t digits = 0;
-	for (; p != i_pEnd && IsDigit(*p); ++p)
-		digits = 10 * digits + std::uint64_t(*p - '0');
-	std::ptrdiff_t count = p - pDigits;
-	std::ptrdiff_t fraction = 0;
-	if (p != i_pEnd && *p == '.')
-	{
-		const char* const pFraction = ++p;
-		for (; p != i_pEnd && IsDigit(*p); ++p)
-			digits = 10 * digits + std::uint64_t(*p - '0');
-		fraction = p - pFraction;
-		count += fraction;
-	}
-	if (count == 0 || fraction > c_MostFraction)
+	const char* const pDigits = i_pFrom != i_pEnd && *i_pFrom == '-' ? i_pFrom + 1 : i_pFrom;
+	if (pDigits == i_pEnd || !(IsDigit(*pDigits) || *pDigits == '.'))
 		return nullptr;
-	// Zeros in front say nothing but where the point is.
-	for (const char* pZero = pDigits; count > c_MostDigits && (*pZero == '0' || *pZero == '.'); ++pZero)
-		count -= *pZero == '0';
-	if (count > c_MostDigits)
+	double value = 0.0;
+	const auto result = std::from_chars(i_pFrom, i_pEnd, value);
+	const char next = result.ptr == i_pEnd ? ' ' : char(*result.ptr | 0x20);
+	if (result.ec != std::errc() || next == 'x' || next == 'e')
 		return nullptr;
-	const char next = p == i_pEnd ? ' ' : char(*p | 0x20);
-	if (next == 'x' || next == 'e')
-		return nullptr;
-	const double value = Quotient(digits, int(fraction));
-	o_rValue = bNegative ? -value : value;
-	return p;
+	o_rValue = value;
+	return result.ptr;
 }
 
 } // namespace
