@@ -263,8 +263,12 @@ TEST_F(SkinCache, FollowsTheFolders)
 {
 	SetFolders({m_Root / "a"});
 	m_Changes = 0;
+	NVX::VLogCategory& rCategory = NVX::GlobalLog::Category("VSkinCache");
+	rCategory.SetLevel(NVX::ELogDetail);
 	Write("a/NobodyWearsIt.fbx");
 	ASSERT_TRUE(WaitForChange());
+	rCategory.SetLevel(NVX::ELogWarning);
+	EXPECT_NE(TakeLog().find("Detected a change to " + (m_Root / "a/NobodyWearsIt.fbx").string()), std::string::npos);
 	m_pDelay->m_Callback();
 	EXPECT_EQ(m_Changes, 1);
 	EXPECT_EQ(Status("Hero"), SkinStatus::c_NotFound);

@@ -111,6 +111,10 @@ TEST(AffineMatrix, IsStoredForRowVectorsAndMultipliesForColumnVectors)
 	EXPECT_TRUE(toEigen(a * b).isApprox(toEigen(a) * toEigen(b), 1e-14));
 	EXPECT_TRUE(toEigen(a.Inverse()).isApprox(toEigen(a).inverse(), 1e-14));
 	EXPECT_TRUE(toEigen(FbxAMatrix(FbxVector4(1, 2, 3), FbxVector4(), FbxVector4(0, 1, 1)).Inverse()).isIdentity());
+	FbxAMatrix moved;
+	moved.SetT(FbxVector4(1, 2, 3, 7));
+	EXPECT_EQ(moved[3][2], 3.0);
+	EXPECT_EQ(moved[3][3], 1.0);
 }
 
 } // namespace

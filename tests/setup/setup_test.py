@@ -69,7 +69,7 @@ class Setup(unittest.TestCase):
         for name, preset in presets.items():
             if not preset.get("hidden"):
                 with self.subTest(name):
-                    self.assertEqual(stated(name).get("RETARGET_TESTS"), "OFF" if name in ("bench", "package") else "ON")
+                    self.assertEqual(stated(name).get("RETARGET_TESTS"), "OFF" if name in ("bench", "fuzzing", "package") else "ON")
                     self.assertEqual(stated(name).get("CMAKE_UNITY_BUILD"), "ON" if name == "package" else "OFF")
 
     def test_answers_help(self):
