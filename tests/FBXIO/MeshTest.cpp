@@ -2,6 +2,7 @@
 
 #include "FBXIO/FBXReader.h"
 
+#include "Imported.h"
 #include "MeshFile.h"
 
 #include <gtest/gtest.h>
@@ -93,6 +94,17 @@ TEST_P(Mesh, NormalsAreTheFilesOnlyByControlPoint)
 		EXPECT_EQ(mesh.m_Vertices[2].m_TexCoord, (std::array<float, 2>{}));
 	}
 	EXPECT_EQ(Told(m_Log), c_NoMessages);
+}
+
+TEST_P(Mesh, NormalsAreMadeForControlPointsAlone)
+{
+	VImported file(Write(GetParam(), OneMesh(), {{0, c_Square, c_Quad, {}, {}, c_OneMaterial, {}, {}}}));
+	FbxMesh* const pMesh = file.Root()->GetChild(0)->GetMesh();
+	ASSERT_NE(pMesh, nullptr);
+	EXPECT_FALSE(pMesh->GenerateNormals(true, false));
+	EXPECT_FALSE(pMesh->GetElementNormal());
+	EXPECT_TRUE(pMesh->GenerateNormals(false, true));
+	EXPECT_FALSE(pMesh->GenerateNormals(false, true)) << "it has some now";
 }
 
 struct VTexCoordRow

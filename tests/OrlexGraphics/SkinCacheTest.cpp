@@ -264,10 +264,11 @@ TEST_F(SkinCache, FollowsTheFolders)
 	SetFolders({m_Root / "a"});
 	m_Changes = 0;
 	NVX::VLogCategory& rCategory = NVX::GlobalLog::Category("VSkinCache");
+	const int level = rCategory.Level();
 	rCategory.SetLevel(NVX::ELogDetail);
 	Write("a/NobodyWearsIt.fbx");
 	ASSERT_TRUE(WaitForChange());
-	rCategory.SetLevel(NVX::ELogWarning);
+	rCategory.SetLevel(level);
 	EXPECT_NE(TakeLog().find("Detected a change to " + (m_Root / "a/NobodyWearsIt.fbx").string()), std::string::npos);
 	m_pDelay->m_Callback();
 	EXPECT_EQ(m_Changes, 1);

@@ -30,16 +30,21 @@ public:
 		for (std::size_t i = 0; i < m_Taken.size(); ++i)
 			places[m_rNew.m_rSubject.m_Segments[i].m_Name].push_back(i);
 		// Of several of one name the one beneath the same parent, or else the next.
-		for (const bool bSameParent : {true, false})
+		for (const bool bAnywhere : {false, true})
 			for (std::size_t i = 0; i < m_Matches.size(); ++i)
-				if (const auto found = places.find(m_rOld.m_rSubject.m_Segments[i].m_Name);
-				    m_Matches[i].m_New < 0 && found != places.end())
-					for (const std::size_t candidate : found->second)
-						if (!m_Taken[candidate] && (!bSameParent || AreChildrenOfMatch(i, candidate)))
-						{
-							Take(i, candidate, ERebindRule::Name, 1.0);
-							break;
-						}
+			{
+				const auto found = places.find(m_rOld.m_rSubject.m_Segments[i].m_Name);
+				if (m_Matches[i].m_New >= 0 || found == places.end())
+					continue;
+				const auto& rPlaces = found->second;
+				const auto free = [&](std::size_t i_New) { return !m_Taken[i_New]; };
+				auto best = std::ranges::find_if(
+				    rPlaces, [&](std::size_t i_New) { return free(i_New) && AreChildrenOfMatch(i, i_New); });
+				if (best == rPlaces.end() && bAnywhere)
+					best = std::ranges::find_if(rPlaces, free);
+				if (best != rPlaces.end())
+					Take(i, *best, ERebindRule::Name, 1.0);
+			}
 	}
 
 	void ByPlaces()
