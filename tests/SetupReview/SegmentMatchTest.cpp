@@ -60,34 +60,34 @@ TEST(SegmentMatch, ByNamesAndPlaces)
 	};
 	const VBone hips{"Hips"};
 	const Rotation::VVector3 up{0.0, 0.0, 100.0};
-	for (const VRow& rRow : std::vector<VRow>{
-	         {"a name wherever it stands", {hips, {"A", 0, up}}, {hips, {"B", 0, up}, {"A", 1}}, "0n 2n"},
-	         {"of two of one name each beneath its own parent",
-	             {hips, {"L", 0}, {"M", 0}, {"T", 1}, {"T", 2}}, {hips, {"M", 0}, {"L", 0}, {"T", 1}, {"T", 2}},
-	             "0n 2n 1n 4n 3n"},
-	         {"the one that is left goes to its own parent",
-	             {hips, {"L", 0}, {"M", 0}, {"T", 1}, {"T", 2}}, {hips, {"L", 0}, {"M", 0}, {"T", 2}}, "0n 1n 2n - 3n"},
-	         {"a child that was a root", {{"A"}, {"B", 0, up}}, {{"B"}, {"A", 0, up}}, "1n 0n"},
-	         {"the first after a root that was put above", {{"A"}, {"T", 0}}, {{"R"}, {"A", 0}, {"T", 0}, {"T", 1}},
-	             "1n 3n"},
-	         {"another name at the same place, and beneath it", {hips, {"A", 0, up}, {"B", 1, up}},
-	             {{"Root"}, {"C", 0, up}, {"D", 1, up}}, "0p 1p 2p"},
-	         {"within a millimetre and a hundredth", {hips, {"A", 0, up}}, {hips, {"B", 0, {1.9, 0.0, 100.0}}}, "0n 1p"},
-	         {"farther", {hips, {"A", 0, up}}, {hips, {"B", 0, {0.0, 0.0, 102.1}}}, "0n -"},
-	         {"close to the parent", {hips, {"A", 0}}, {hips, {"B", 0, {0.0, -1.0, 0.0}}}, "0n 1p"},
-	         {"two new ones at the place", {hips, {"A", 0, up}}, {hips, {"B", 0, up}, {"C", 0, up}}, "0n -"},
-	         {"two old ones at the place", {hips, {"A", 0, up}, {"B", 0, up}}, {hips, {"C", 0, up}}, "0n - -"},
-	         {"one between two", {hips, {"A", 0, up}, {"B", 0, {0.0, 3.0, 100.0}}},
-	             {hips, {"C", 0, {0.0, 1.5, 100.0}}}, "0n - -"},
-	         {"two at the place of which one has its name", {hips, {"A", 0, up}, {"B", 0, up}},
-	             {hips, {"B", 0, up}, {"C", 0, up}}, "0n 2p 1n"},
-	         {"each its own place", {hips, {"A", 0, up}, {"B", 0}}, {hips, {"C", 0}, {"D", 0, up}}, "0n 2p 1p"},
-	         {"at the place beneath another parent", {hips, {"A", 0}, {"B", 1, up}}, {hips, {"A", 0}, {"C", 0, up}},
-	             "0n 1n -"},
-	         {"fewer bones", {hips, {"A", 0, up}, {"B", 1, up}}, {{"B"}}, "- - 0n"},
-	         {"nothing new", {hips, {"A", 0}}, {}, "- -"},
-	         {"nothing old", {}, {hips}, ""},
-	     })
+	const VRow rows[]{
+	    {"a name wherever it stands", {hips, {"A", 0, up}}, {hips, {"B", 0, up}, {"A", 1}}, "0n 2n"},
+	    {"of two of one name each beneath its own parent", {hips, {"L", 0}, {"M", 0}, {"T", 1}, {"T", 2}},
+	        {hips, {"M", 0}, {"L", 0}, {"T", 1}, {"T", 2}}, "0n 2n 1n 4n 3n"},
+	    {"the one that is left goes to its own parent", {hips, {"L", 0}, {"M", 0}, {"T", 1}, {"T", 2}},
+	        {hips, {"L", 0}, {"M", 0}, {"T", 2}}, "0n 1n 2n - 3n"},
+	    {"a child that was a root", {{"A"}, {"B", 0, up}}, {{"B"}, {"A", 0, up}}, "1n 0n"},
+	    {"the first after a root that was put above", {{"A"}, {"T", 0}}, {{"R"}, {"A", 0}, {"T", 0}, {"T", 1}},
+	        "1n 3n"},
+	    {"another name at the same place, and beneath it", {hips, {"A", 0, up}, {"B", 1, up}},
+	        {{"Root"}, {"C", 0, up}, {"D", 1, up}}, "0p 1p 2p"},
+	    {"within a millimetre and a hundredth", {hips, {"A", 0, up}}, {hips, {"B", 0, {1.9, 0.0, 100.0}}}, "0n 1p"},
+	    {"farther", {hips, {"A", 0, up}}, {hips, {"B", 0, {0.0, 0.0, 102.1}}}, "0n -"},
+	    {"close to the parent", {hips, {"A", 0}}, {hips, {"B", 0, {0.0, -1.0, 0.0}}}, "0n 1p"},
+	    {"two new ones at the place", {hips, {"A", 0, up}}, {hips, {"B", 0, up}, {"C", 0, up}}, "0n -"},
+	    {"two old ones at the place", {hips, {"A", 0, up}, {"B", 0, up}}, {hips, {"C", 0, up}}, "0n - -"},
+	    {"one between two", {hips, {"A", 0, up}, {"B", 0, {0.0, 3.0, 100.0}}}, {hips, {"C", 0, {0.0, 1.5, 100.0}}},
+	        "0n - -"},
+	    {"two at the place of which one has its name", {hips, {"A", 0, up}, {"B", 0, up}},
+	        {hips, {"B", 0, up}, {"C", 0, up}}, "0n 2p 1n"},
+	    {"each its own place", {hips, {"A", 0, up}, {"B", 0}}, {hips, {"C", 0}, {"D", 0, up}}, "0n 2p 1p"},
+	    {"at the place beneath another parent", {hips, {"A", 0}, {"B", 1, up}}, {hips, {"A", 0}, {"C", 0, up}},
+	        "0n 1n -"},
+	    {"fewer bones", {hips, {"A", 0, up}, {"B", 1, up}}, {{"B"}}, "- - 0n"},
+	    {"nothing new", {hips, {"A", 0}}, {}, "- -"},
+	    {"nothing old", {}, {hips}, ""},
+	};
+	for (const VRow& rRow : rows)
 		EXPECT_EQ(Matches(rRow.m_Old, rRow.m_New), rRow.m_pMatches) << rRow.m_pWhat;
 }
 

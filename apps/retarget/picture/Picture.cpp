@@ -126,12 +126,12 @@ QImage DrawTake(VSession& io_rSession, const VRenderSettings& i_rSettings)
 	for (int i = 0; i < count; ++i)
 	{
 		// All frames up to it, as a solve of the take has them.
-		const std::vector<double>* pStates = nullptr;
-		for (; next <= i_rSettings.m_Frames[std::size_t(i)]; ++next)
-			pStates = &rSolve.Solve(next).m_States;
+		for (; next < i_rSettings.m_Frames[std::size_t(i)]; ++next)
+			rSolve.Solve(next);
+		const std::vector<double>& rStates = rSolve.Solve(next++).m_States;
 		io_rSession.Document().SetSourceSubject(
 		    WithWorldPoses(*source.m_pParametrised, rSolve.SourcePoses()), *source.m_pApplicationData);
-		io_rSession.Document().SetTargetSubjectParametrised(WithBindPose(*target.m_pParametrised, *pStates));
+		io_rSession.Document().SetTargetSubjectParametrised(WithBindPose(*target.m_pParametrised, rStates));
 		const QImage picture = Draw(io_rSession, i_rSettings);
 		if (strip.isNull())
 			strip = QImage(count * picture.width(), picture.height(), picture.format());

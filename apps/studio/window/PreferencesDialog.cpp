@@ -55,10 +55,14 @@ VPreferencesDialog::VPreferencesDialog(VPreferences& i_rPreferences, QWidget* i_
 
 	std::vector<std::pair<std::string, QString>> folders, products;
 	for (std::size_t i = 0; i < TesselPluginInterface::c_FolderKeys.size(); ++i)
+	{
+		if (folders.size() == c_FoldersFirst - 2)
+		{
+			folders.emplace_back(c_pTakesFolderKey, tr("Takes (recorded motion of performers)"));
+			folders.emplace_back(c_pPresetsFolderKey, tr("Presets (pairs for several characters)"));
+		}
 		folders.emplace_back(TesselPluginInterface::c_FolderKeys[i], FolderLabels()[i]);
-	folders.insert(folders.begin() + c_FoldersFirst - 2,
-	    {{c_pTakesFolderKey, tr("Takes (recorded motion of performers)")},
-	        {c_pPresetsFolderKey, tr("Presets (pairs for several characters)")}});
+	}
 	for (const char* pProduct : c_pProducts)
 		products.emplace_back(UtilsFileSystem::ProductFolderKey(pProduct), QLatin1String(pProduct));
 

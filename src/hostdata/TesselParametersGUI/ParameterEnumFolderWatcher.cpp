@@ -158,8 +158,9 @@ void VParameterEnumFolderWatcher::Accept(VFolderState i_State)
 	std::vector<VFolderFile> files;
 	for (const auto& [rPath, rFile] : m_State.m_Files)
 		files.push_back(rFile);
+	files = OnePerName(std::move(files));
 	std::vector<VEnumEntry> entries;
-	for (VFolderFile& rFile : OnePerName(std::move(files)))
+	for (VFolderFile& rFile : files)
 		entries.push_back({std::move(rFile.m_Name), TesselDataStore::ToVariant(rFile.m_Path)});
 	SetEnumeration(PermittedValues(std::move(entries)));
 	ClearVanishedValue(m_bStarted ? &before : nullptr);

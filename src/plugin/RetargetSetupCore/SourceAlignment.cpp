@@ -43,7 +43,9 @@ std::vector<SetupProposal::VMappedJoints> MappedSegments(
 			    || (rTarget.m_Type == VSubjectParametrised::VTarget::ELocalRotationToWorldRotation) != bRotation)
 				continue;
 			const std::string* const pName = SourceName(i_rTarget, rTarget);
-			if (const auto source = pName ? sources.find(*pName) : sources.end(); source != sources.end())
+			if (!pName)
+				continue;
+			if (const auto source = sources.find(*pName); source != sources.end())
 				mapped.emplace(rTarget.m_SegmentIndices[0], source->second);
 		}
 	std::vector<SetupProposal::VMappedJoints> pairs;
@@ -94,11 +96,11 @@ std::optional<SetupProposal::VPoseFinding> ScaleFinding(const VSubjectParametris
 {
 	const auto source = RestOf(i_rSourceParametrised, i_rSource);
 	const auto target = RestOf(i_rTargetParametrised, i_rTarget);
-	for (SetupProposal::VPoseFinding& rFinding :
-	    SetupProposal::CheckPose(source, target, SetupProposal::Propose(source, target)))
-		if (std::string_view(rFinding.m_pId) == "scale")
-			return std::move(rFinding);
-	return std::nullopt;
+	std::vector<SetupProposal::VPoseFinding> findings =
+	    SetupProposal::CheckPose(source, target, SetupProposal::Propose(source, target));
+	const auto found =
+	    std::ranges::find(findings, std::string_view("scale"), [](const auto& i_rFinding) { return i_rFinding.m_pId; });
+	return found == findings.end() ? std::nullopt : std::optional(std::move(*found));
 }
 
 std::optional<VAligned> AlignToSource(const VSubjectParametrised& i_rSourceParametrised, const VSubject& i_rSource,

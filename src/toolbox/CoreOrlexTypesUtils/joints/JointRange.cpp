@@ -96,8 +96,10 @@ void SampleBoundary(const VNumbers& i_rCentre, const VNumbers& i_rMatrix, VNumbe
 			    + i_rDirection.Sin * extents[i_B] * eigen.Vectors()[i_B * t_Size + i];
 		const VMatrix3 turn = Rotation::RotationMatrixFromAngleAxis({state[0], state[1], state[2]});
 		const VVector3 angles = EulerNextTo(Rotation::Product(centre, turn), centreAngles);
-		for (std::size_t i = 0; i < t_Size; ++i)
-			EulerData[i].push_back(i < 3 ? angles[i] : i_rCentre[i] + state[i]);
+		for (std::size_t i = 0; i < 3; ++i)
+			EulerData[i].push_back(angles[i]);
+		for (std::size_t i = 3; i < t_Size; ++i)
+			EulerData[i].push_back(i_rCentre[i] + state[i]);
 	};
 	for (std::size_t a = 0; a < t_Size; ++a)
 		for (std::size_t b = a + 1; b < t_Size; ++b)
