@@ -30,7 +30,7 @@ if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_L
 endif()
 # ./run and ./test compile many files of a target as one, which takes a third of the time; g++ then takes each file for
 # a header.
-set(CMAKE_UNITY_BUILD_BATCH_SIZE 16 CACHE STRING "How many files of a target are compiled as one; 0: all")
+set(CMAKE_UNITY_BUILD_BATCH_SIZE 0 CACHE STRING "How many files of a target are compiled as one; 0: all")
 if(CMAKE_UNITY_BUILD AND CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
 	add_compile_options(-Wno-subobject-linkage)
 endif()

@@ -275,3 +275,13 @@ std::string BrokenGltfRule(const std::string& i_rBytes)
 	}
 	return {};
 }
+
+std::set<std::string> AnimatedNodes(const std::string& i_rBytes)
+{
+	const VGltf gltf = VGltf::parse(i_rBytes.substr(20, Load<std::uint32_t>(i_rBytes, 12)));
+	std::set<std::string> names;
+	for (const VGltf& rAnimation : gltf.at("animations"))
+		for (const VGltf& rChannel : rAnimation.at("channels"))
+			names.insert(gltf["nodes"][rChannel["target"]["node"].get<std::size_t>()].at("name"));
+	return names;
+}

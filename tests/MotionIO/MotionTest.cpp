@@ -487,4 +487,21 @@ TEST(MotionFiles, LeaveOutWhatHasNoBoneAndKeepEnds)
 	EXPECT_NEAR(read.m_Joints[1].m_Ends[0][2], 15.0, 1e-9);
 }
 
+TEST(MotionFiles, DriveTheBoneOfTheWholeName)
+{
+	const VCharacterFile character{"hero.fbx",
+	    FbxTest::Write(FbxTest::c_Forms[1],
+	        FbxTest::VTestScene{{{"x:bone", "LimbNode", -1, {}}, {"bone", "LimbNode", -1, {}}},
+	            {{"UpAxis", {2}}, {"UnitScaleFactor", {0.1}}}, {}, {}})};
+	VTake take;
+	take.m_Rate = 30.0;
+	take.m_FileUp = TakeIO::EUp::Z;
+	take.m_Joints.emplace_back().m_Name = "bone";
+	AddChannels(take, 0, true);
+	AddFrame(take, std::vector<VJointPose>(1));
+	std::string bytes, error;
+	ASSERT_EQ(PrintMotion(take, EMotionForm::Gltf, &character, {}, bytes, error), EPrinted::Done) << error;
+	EXPECT_EQ(AnimatedNodes(bytes), std::set<std::string>{"bone"});
+}
+
 } // namespace

@@ -12,7 +12,6 @@ namespace
 
 constexpr std::array<int, 3> c_Green{51, 255, 51};
 constexpr std::array<int, 3> c_Blue{51, 51, 255};
-constexpr std::array<int, 3> c_Yellow{255, 255, 0};
 
 class RenderManipulator : public VRenderTypeTest
 {

@@ -18,6 +18,9 @@
 #include <utility>
 #include <vector>
 
+/// What is under the hand.
+inline constexpr std::array<int, 3> c_Yellow{255, 255, 0};
+
 /// One render type, drawn without a scene.
 class VRenderTypeTest : public GraphicsTest::VDrawingTest
 {

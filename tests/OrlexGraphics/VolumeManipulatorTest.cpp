@@ -16,7 +16,7 @@ constexpr int c_VolumeHeight = 300;
 const VVolume c_Volume{QVector3D(-1000, -2000, -100), QVector3D(1000, 2000, 3000)};
 
 /// 20 mm a pixel, the world's origin in the middle.
-CoreGraphics::VCameraController MakeCamera(std::uint32_t i_Type, bool i_bYUp = false)
+CoreGraphics::VCameraController VolumeCamera(std::uint32_t i_Type, bool i_bYUp = false)
 {
 	CoreGraphics::VCameraController camera;
 	camera.m_Type = i_Type;
@@ -35,7 +35,7 @@ protected:
 	void SetUp() override
 	{
 		VRenderTypeTest::SetUp();
-		m_Camera = MakeCamera(CoreGraphics::ECameraTop);
+		m_Camera = VolumeCamera(CoreGraphics::ECameraTop);
 		m_pManipulator = std::make_unique<VRenderVolumeManipulator>(
 		    m_Library, m_pRegistry, m_pSelection, "Volume", QVector3D(1.0f, 0.0f, 1.0f), c_Volume);
 	}
@@ -45,7 +45,6 @@ protected:
 INSTANTIATE_IN_BOTH_DIALECTS(VolumeManipulator);
 
 constexpr std::array<int, 3> c_Magenta{255, 0, 255};
-constexpr std::array<int, 3> c_Yellow{255, 255, 0};
 constexpr std::array<int, 3> c_Nothing{40, 40, 40};
 
 } // namespace
@@ -84,7 +83,7 @@ TEST(VolumeDrag, HandlesMoveTheirSides)
 	for (const VRow& rRow : rows)
 	{
 		SCOPED_TRACE(rRow.m_pName);
-		const CoreGraphics::VCameraController camera = MakeCamera(rRow.m_Type, rRow.m_bYUp);
+		const CoreGraphics::VCameraController camera = VolumeCamera(rRow.m_Type, rRow.m_bYUp);
 		const auto drag = VVolumeDrag::Press(camera, {123, 45}, rRow.m_Handle, c_Volume);
 		ASSERT_TRUE(drag);
 		const auto moved = drag->Drag(camera, QPoint(123, 45) + rRow.m_Move);
@@ -93,9 +92,9 @@ TEST(VolumeDrag, HandlesMoveTheirSides)
 		EXPECT_LT((moved->m_Maximum - rRow.m_Expected.m_Maximum).length(), 0.1f);
 	}
 	// Along the view there is no place for the mouse, and there are no other handles.
-	const CoreGraphics::VCameraController top = MakeCamera(CoreGraphics::ECameraTop);
+	const CoreGraphics::VCameraController top = VolumeCamera(CoreGraphics::ECameraTop);
 	EXPECT_FALSE(VVolumeDrag::Press(top, {1, 1}, {EVolumeFace, 5}, c_Volume));
-	EXPECT_FALSE(VVolumeDrag::Press(MakeCamera(CoreGraphics::ECameraFront), {1, 1}, {EVolumeCentre, 0}, c_Volume));
+	EXPECT_FALSE(VVolumeDrag::Press(VolumeCamera(CoreGraphics::ECameraFront), {1, 1}, {EVolumeCentre, 0}, c_Volume));
 	for (const VVolumeHandle& rHandle : {VVolumeHandle{EVolumeFace, 6}, {EVolumeCorner, 4}, {EVolumeCentre, 1}, {3, 0}})
 		EXPECT_FALSE(VVolumeDrag::Press(top, {1, 1}, rHandle, c_Volume));
 }

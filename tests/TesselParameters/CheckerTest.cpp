@@ -81,8 +81,8 @@ TEST(Checker, LimitsAndPermittedValues)
 		io_rParameter.SetEnumeration({{"low", ToVariant(1.0)}, {"high", ToVariant(2.0)}});
 	};
 	const auto emptyList = [](VParameter& io_rParameter) { io_rParameter.SetEnumeration({}); };
-	const auto expression = [](VParameter& io_rParameter) { io_rParameter.SetValidatorRegEx("[0-9]+"); };
-	const auto broken = [](VParameter& io_rParameter) { io_rParameter.SetValidatorRegEx("["); };
+	const auto expression = [](const char* i_pText)
+	{ return [=](VParameter& io_rParameter) { io_rParameter.SetValidatorRegEx(i_pText); }; };
 	const char* const pLess = "Value is less than permitted minimum";
 	const char* const pGreater = "Value is greater than permitted maximum";
 	const char* const pOther = "Value is not one of the permitted values";
@@ -104,9 +104,13 @@ TEST(Checker, LimitsAndPermittedValues)
 	    {"not listed", list, "3", pOther},
 	    {"no list at all", emptyList, "3", ""},
 	    {"no number", nothing, "abc", "Value is not a number"},
-	    {"matches", expression, "12", ""},
-	    {"matches in part", expression, "12.5", "Value does not match the form \"[0-9]+\""},
-	    {"no expression", broken, "1", "Value does not match the form \"[\""},
+	    {"matches", expression("[0-9]+"), "12", ""},
+	    {"matches in part", expression("[0-9]+"), "12.5", "Value does not match the form \"[0-9]+\""},
+	    {"no expression", expression("["), "1", "Value does not match the form \"[\""},
+	    {"calls itself", expression("[0-9](?R)?"), "12", "Value does not match the form \"[0-9](?R)?\""},
+	    {"calls its group", expression("([0-9])(?-1)"), "12", "Value does not match the form \"([0-9])(?-1)\""},
+	    {"a bracket that may be missing", expression("\\(?1?2"), "12", ""},
+	    {"a group that is not counted", expression("(?:1)(?i)2"), "12", ""},
 	};
 	for (const auto& rRow : rows)
 	{

@@ -50,6 +50,14 @@ def test_every_field_goes_through_python(path, tmp_path):
     assert (tmp_path / "ours\udcff.qrs").read_bytes() == (tmp_path / "theirs.qrs").read_bytes()
 
 
+def test_bones_of_a_file(saved):
+    bones = rs.bones(FBX)
+    skull = next(bone for bone in bones if bone.name == "skull")
+    parents = {segment.name: segment.parent_segment_index for segment in rs.read(saved).subject.segments}
+    assert set(parents) <= {bone.name for bone in bones} and skull.matrix.shape == (4, 4)
+    assert bones[skull.parent].name == rs.read(saved).subject.segments[parents["skull"]].name
+
+
 def arm():
     """A root of any pose, and an elbow 100 mm along its x, which is a hinge about z."""
     free = rs.Joint(joint_type=rs.JointType.FREE, bind_pose=[0.0] * 6)

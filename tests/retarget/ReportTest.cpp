@@ -37,8 +37,10 @@ TEST(Report, TellsTheSetUp)
 	for (const char* const pShown : {"&lt;script&gt;[U+202E]", "Retarget subject &lt;i&gt;&amp;#10;.qrr",
 	         "<bdi>Position</bdi></td><td><bdi>Hips</bdi>",
 	         "<bdi>Hips</bdi></td><td class=\"n\"><bdi>1</bdi></td><td class=\"n\"><bdi>3.0, 4.0, 0.0 mm</bdi>",
-	         "<bdi>upper arm</bdi>", "<bdi>LeftHandThumb2</bdi></td><td><bdi>go</bdi>",
-	         "No range of motion: no target follows a segment", "Pictures were not asked for"})
+	         "<bdi>upper arm</bdi></td><td class=\"n\"><bdi>2</bdi></td><td class=\"n\"><bdi>0</bdi></td>"
+	         "<td class=\"n\"><bdi>1</bdi></td><td><bdi>RightArm</bdi>",
+	         "<bdi>LeftHandThumb2</bdi></td><td><bdi>go</bdi>", "No range of motion: no target follows a segment",
+	         "Pictures were not asked for"})
 		EXPECT_NE(page.find(pShown), std::string::npos) << pShown;
 	EXPECT_EQ(folder.Run(report).m_Out, page);
 

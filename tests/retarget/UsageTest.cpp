@@ -38,6 +38,7 @@ TEST(Usage, WrongWords)
 	RunRows({
 	    {"unknown command", {"creat", "--fbx", "x"}, 2, "",
 	        "error retarget: there is no command \"creat\"; did you mean \"create\"?; see \"retarget --help\"\n"},
+	    {"nothing like a command", {"fkx1"}, 2, "", "there is no command \"fkx1\"; see"},
 	    {"help of an unknown command", {"-q", "creat", "--help"}, 2, "", "there is no command \"creat\"; did you mean"},
 	    {"help of the same as a word", {"help", "creat"}, 2, "", "there is no command \"creat\"; did you mean"},
 	    {"unknown option", {"dump", "--evaluatd", "x"}, 2, "",

@@ -3,10 +3,10 @@
 #include "CommandLineText/HelpFormatter.h"
 #include "CommandLineText/Messages.h"
 #include "CommandLineText/System.h"
+#include "numerics/Rotation.h"
 #include "retarget/text/Table.h"
 
 #include <cmath>
-#include <numbers>
 #include <unistd.h>
 
 namespace CommandLine
@@ -16,9 +16,9 @@ namespace
 
 using namespace TakeSolve;
 using CoreOrlexTypes::VSubject;
+using Rotation::c_Degrees;
 using SetupProposal::ESide;
 
-constexpr double c_Degrees = 180.0 / std::numbers::pi;
 /// A foot may slide by this beyond the performer's, and stand so far from the floor, in mm.
 constexpr double c_FineSlide = 30.0;
 constexpr double c_FineHeight = 30.0;

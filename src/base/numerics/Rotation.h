@@ -2,6 +2,7 @@
 
 #include <array>
 #include <cmath>
+#include <numbers>
 
 /// Rotations are 3x3 matrices, row by row, or angle-axis vectors: direction the axis, length the angle in radians.
 namespace Rotation
@@ -11,6 +12,9 @@ using VVector3 = std::array<double, 3>;
 using VMatrix3 = std::array<double, 9>;
 
 inline constexpr VMatrix3 c_Identity3{1, 0, 0, 0, 1, 0, 0, 0, 1};
+
+/// Of a radian.
+inline constexpr double c_Degrees = 180.0 / std::numbers::pi;
 
 /// Angles below ten times the machine epsilon count as no rotation.
 inline constexpr double c_SmallestAngle = 2.220446049250313e-15;

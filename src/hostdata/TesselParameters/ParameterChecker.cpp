@@ -115,8 +115,32 @@ bool ReadLimit(const IDataReader& i_rAttributes, const char* i_pKey, T& o_rLimit
 	    && SameSchema(value.m_pSchema, TesselDataStore::SchemaOf<T>()) && TesselDataStore::FromVariant(value, o_rLimit);
 }
 
+/// "(?R)", "(?1)", "(?-1)", "(?&name)" or "(?P>name)": what a short one of these matches may take seconds to tell.
+bool CallsItself(std::string_view i_Expression)
+{
+	static constexpr std::string_view c_Digits = "0123456789";
+	for (std::size_t i = 0; i + 2 < i_Expression.size(); ++i)
+	{
+		if (i_Expression[i] == '\\')
+			++i;
+		else if (i_Expression.substr(i, 2) == "(?")
+		{
+			std::string_view kind = i_Expression.substr(i + 2);
+			if (kind.starts_with("R") || kind.starts_with("&") || kind.starts_with("P>"))
+				return true;
+			if (kind.starts_with("+") || kind.starts_with("-"))
+				kind.remove_prefix(1);
+			if (!kind.empty() && c_Digits.find(kind.front()) != c_Digits.npos)
+				return true;
+		}
+	}
+	return false;
+}
+
 bool Matches(const std::string& i_rText, const std::string& i_rExpression)
 {
+	if (CallsItself(i_rExpression))
+		return false;
 	try
 	{
 		return boost::regex_match(i_rText, boost::regex(i_rExpression));

@@ -4,16 +4,14 @@
 
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 
 namespace TakeSolve
 {
 
+using Rotation::c_Degrees;
 using Rotation::VMatrix3;
 using Rotation::VVector3;
 using VWorldPose = Rotation::VPose<double>;
-
-inline constexpr double c_Degrees = 180.0 / std::numbers::pi;
 
 inline VVector3 Difference(const VVector3& i_rA, const VVector3& i_rB)
 {

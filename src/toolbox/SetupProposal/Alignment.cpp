@@ -7,7 +7,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 #include <optional>
 #include <set>
 
@@ -29,8 +28,6 @@ constexpr double c_FarthestTurn = 120.0;
 constexpr double c_AsGoodDegrees = 0.1;
 /// The cosine of a slope from which on a direction seen from above tells nothing.
 constexpr double c_Steep = 0.2;
-
-constexpr double c_InDegrees = 180.0 / std::numbers::pi;
 
 enum EChain : std::size_t
 {
@@ -68,7 +65,7 @@ double AngleFromTo(const VVector3& i_rA, const VVector3& i_rB)
 {
 	const VVector3 cross{i_rA[1] * i_rB[2] - i_rA[2] * i_rB[1], i_rA[2] * i_rB[0] - i_rA[0] * i_rB[2],
 	    i_rA[0] * i_rB[1] - i_rA[1] * i_rB[0]};
-	return c_InDegrees * std::atan2(LengthOf(cross), i_rA[0] * i_rB[0] + i_rA[1] * i_rB[1] + i_rA[2] * i_rB[2]);
+	return Rotation::c_Degrees * std::atan2(LengthOf(cross), i_rA[0] * i_rB[0] + i_rA[1] * i_rB[1] + i_rA[2] * i_rB[2]);
 }
 
 /// The smallest rotation from one direction to the other; none for opposite ones.
@@ -79,7 +76,7 @@ VMatrix3 Swing(const VVector3& i_rFrom, const VVector3& i_rTo)
 	const double length = LengthOf(axis);
 	if (!(length > 0.0))
 		return Rotation::c_Identity3;
-	const double angle = AngleFromTo(i_rFrom, i_rTo) / c_InDegrees;
+	const double angle = AngleFromTo(i_rFrom, i_rTo) / Rotation::c_Degrees;
 	for (double& rValue : axis)
 		rValue *= angle / length;
 	return Rotation::RotationMatrixFromAngleAxis(axis);
@@ -98,7 +95,7 @@ double HeadingFromTo(const VVector3& i_rA, const VVector3& i_rB)
 
 double SlopeOf(const VVector3& i_rVector)
 {
-	return c_InDegrees * std::atan2(i_rVector[2], std::hypot(i_rVector[0], i_rVector[1]));
+	return Rotation::c_Degrees * std::atan2(i_rVector[2], std::hypot(i_rVector[0], i_rVector[1]));
 }
 
 bool IsFlat(const VVector3& i_rVector)
@@ -196,7 +193,7 @@ public:
 		for (const VAim& rAim : m_Aims)
 			if (Wanted().contains(rAim.m_Member.m_Chain))
 				alignment.m_Joints.push_back(Row(rAim, chains, posed));
-		alignment.m_TurnDegrees = Turns(chains) ? c_InDegrees * m_Turn : 0.0;
+		alignment.m_TurnDegrees = Turns(chains) ? Rotation::c_Degrees * m_Turn : 0.0;
 		alignment.m_MoveMm = Move(chains, posed);
 		for (VVector3& rPlace : posed.m_Places)
 			for (std::size_t axis = 0; axis < 3; ++axis)

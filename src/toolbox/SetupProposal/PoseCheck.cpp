@@ -7,7 +7,6 @@
 #include <cmath>
 #include <limits>
 #include <map>
-#include <numbers>
 #include <optional>
 #include <string_view>
 
@@ -31,8 +30,6 @@ constexpr double c_FineSole = 5.0;
 
 /// Tenths of a millimetre of a leg.
 constexpr int c_ScaleDigits = 4;
-
-constexpr double c_Degrees = 180.0 / std::numbers::pi;
 
 /// The lowest joint of the feet; nothing without feet.
 std::optional<std::size_t> LowestOfFeet(const VRestSkeleton& i_rSkeleton, const VBodyReading& i_rBody)
@@ -79,7 +76,8 @@ struct VBody
 				continue;
 			const auto& rFrom = m_rSkeleton[*from].m_Place;
 			const auto& rTo = m_rSkeleton[*to].m_Place;
-			sum += c_Degrees * std::atan2(rFrom[2] - rTo[2], std::hypot(rTo[0] - rFrom[0], rTo[1] - rFrom[1]));
+			sum +=
+			    Rotation::c_Degrees * std::atan2(rFrom[2] - rTo[2], std::hypot(rTo[0] - rFrom[0], rTo[1] - rFrom[1]));
 			++sides;
 		}
 		return sides == 0 ? std::nullopt : std::optional(sum / sides);
@@ -112,7 +110,7 @@ VPoseFinding Facing(const VBody& i_rSource, const VBody& i_rTarget)
 	const auto& rSource = i_rSource.m_rReading.m_Frame.m_Forward;
 	const auto& rTarget = i_rTarget.m_rReading.m_Frame.m_Forward;
 	// To the left, seen from above, of what turns the target to the source.
-	const double turn = c_Degrees
+	const double turn = Rotation::c_Degrees
 	    * std::atan2(
 	        rTarget[0] * rSource[1] - rTarget[1] * rSource[0], rTarget[0] * rSource[0] + rTarget[1] * rSource[1]);
 	VPoseFinding finding{"facing", std::abs(turn) <= c_FineFacing, "", {{"turnDegrees", turn}}, ""};
@@ -189,7 +187,7 @@ std::optional<double> Lean(const VBody& i_rTarget, ESide i_Side)
 {
 	const auto foot = i_rTarget.Joint(EFoot, i_Side);
 	const auto level = foot ? LevelAsBound(i_rTarget.m_rSkeleton[*foot]) : std::nullopt;
-	return level ? std::optional(c_Degrees * std::acos(std::clamp((*level)[8], -1.0, 1.0))) : std::nullopt;
+	return level ? std::optional(Rotation::c_Degrees * std::acos(std::clamp((*level)[8], -1.0, 1.0))) : std::nullopt;
 }
 
 std::optional<VPoseFinding> Soles(const VBody& i_rTarget)

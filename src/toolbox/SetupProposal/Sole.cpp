@@ -24,8 +24,6 @@ constexpr double c_AsLevel = 3.0;
 constexpr double c_Steepest = 4.0;
 constexpr double c_Within = 1e-3;
 
-constexpr double c_InDegrees = 180.0 / std::numbers::pi;
-
 /// Where a concave function of one variable is largest, by golden sections.
 template <typename VFunction>
 double WhereLargest(const VFunction& i_rFunction)
@@ -74,7 +72,7 @@ double TiltOfLowerFace(const std::vector<VVector3>& i_rPoints)
 	};
 	const auto bestY = [&](double i_X) { return WhereLargest([&](double i_Y) { return beneath(i_X, i_Y); }); };
 	const double x = WhereLargest([&](double i_X) { return beneath(i_X, bestY(i_X)); });
-	return c_InDegrees * std::atan(std::hypot(x, bestY(x)));
+	return Rotation::c_Degrees * std::atan(std::hypot(x, bestY(x)));
 }
 
 /// From where it stands, along the axes of the world: each, or one of so many.
