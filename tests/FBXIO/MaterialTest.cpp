@@ -271,12 +271,13 @@ TEST_P(Material, TexturesOfOtherLayersAreNotDiffuse)
 TEST_P(Material, OfAnUnknownClassHasNoTexture)
 {
 	WritePicture("skin.png", 3);
-	const std::vector<VMeshPart> parts =
-	    Read({{"blinn", {}, Path("skin.png"), ""}, {"phong", {}, Path("skin.png"), ""}});
-	ASSERT_EQ(parts.size(), 2u);
+	const std::vector<VMeshPart> parts = Read({{"blinn", {}, Path("skin.png"), ""}, {"phong", {}, Path("skin.png"), ""},
+	    {"phong", {}, Path("skin.png"), "", {}, false, "NormalMap"}});
+	ASSERT_EQ(parts.size(), 3u);
 	EXPECT_EQ(parts[0].m_pTexture, nullptr);
 	ASSERT_NE(parts[1].m_pTexture, nullptr);
 	EXPECT_EQ(parts[1].m_pTexture->m_Width, 3);
+	EXPECT_EQ(parts[2].m_pTexture != nullptr, GetParam().m_Version < 7000) << "no colour";
 	EXPECT_TRUE(m_Failed.Take().empty());
 }
 

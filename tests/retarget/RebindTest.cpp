@@ -55,6 +55,8 @@ TEST_F(Rebind, AnotherPrefixKeepsAll)
 	EXPECT_EQ(json["lost"].size(), 0u);
 	for (const VJson& rMatch : json["segments"])
 		EXPECT_EQ(rMatch["new"], "Rig_" + rMatch["old"].get<std::string>());
+	for (const VJson& rTarget : RunJson({"-q", "targets", "new.qrr", "--json"}, m_Folder))
+		EXPECT_TRUE(rTarget["name"].get<std::string>().ends_with(rTarget["target"].get<std::string>())) << rTarget;
 	EXPECT_EQ(replace_all_copy(replace_all_copy(m_Folder.Read("new.qrr"), "Rig_", ""), "\"prefix\"", "\"own\""),
 	    m_Folder.Read("own.qrr"));
 }

@@ -212,7 +212,8 @@ TEST(Elements, ReadsNumbersThatAreFiniteOnly)
 	EXPECT_EQ(SplitAssignment("a=b=1", "N=W"), (std::pair<std::string, std::string>("a=b", "1")));
 	EXPECT_EQ(RefusalOf([] { SplitAssignment("=1", "N=W"); }), "\"=1\" is not N=W");
 	EXPECT_EQ(ParseIndex("#2", "target", 3), 2u);
-	EXPECT_EQ(RefusalOf([] { ParseIndex("3", "target", 3); }), "there is no target #3; they go from #0 to #2");
+	for (const char* pWord : {"3", "#3"})
+		EXPECT_EQ(RefusalOf([&] { ParseIndex(pWord, "target", 3); }), "there is no target #3; they go from #0 to #2");
 	EXPECT_EQ(RefusalOf([] { ParseIndex("-1", "target", 3); }), "\"-1\" is not the index of a target");
 }
 
