@@ -293,7 +293,7 @@ TEST(Versions, EachFieldThatIsLostIsTold)
 		VSubjectApplicationData& m_rApp;
 		VSubjectParametrised::VSegment& m_rSegment = m_rSubject.m_Segments.at(2);
 		VSubjectParametrised::VJoint& m_rJoint = m_rSegment.m_Joint;
-		VMarker& m_rMarker = m_rSubject.m_Markers.at(1);
+		VMarker& m_rMarker = m_rSubject.m_Markers.front();
 		VTarget& m_rTarget = m_rSubject.m_Targets.at(1);
 		VSubjectParametrised::VDynamicParameter& m_rParameter = m_rSubject.m_DynamicParameters.at(0);
 		VSubjectApplicationData::VSegment& m_rDraw = m_rApp.m_Segments.at(2);

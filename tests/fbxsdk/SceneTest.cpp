@@ -41,6 +41,11 @@ TEST(Scene, TellsItsSettingsInEveryForm)
 		int major = 0, minor = 0, revision = 0;
 		file.m_pImporter->GetFileVersion(major, minor, revision);
 		EXPECT_EQ(major * 1000 + minor * 100 + revision * 10, int(rForm.m_Version));
+		for (const double none : {-1.0, 3.0})
+		{
+			VImported other(Write(rForm, VTestScene{{{"root", "Root", -1, {}}}, {{"UpAxis", {none}}}, {}, {}}));
+			EXPECT_EQ(other.m_pScene->GetGlobalSettings().GetAxisSystem().GetUpVector(sign), FbxAxisSystem::eXAxis);
+		}
 	}
 }
 
