@@ -160,6 +160,7 @@ void VParameterEnumFolderWatcher::Accept(VFolderState i_State)
 		files.push_back(rFile);
 	files = OnePerName(std::move(files));
 	std::vector<VEnumEntry> entries;
+	entries.reserve(files.size());
 	for (VFolderFile& rFile : files)
 		entries.push_back({std::move(rFile.m_Name), TesselDataStore::ToVariant(rFile.m_Path)});
 	SetEnumeration(PermittedValues(std::move(entries)));
