@@ -110,6 +110,7 @@ TEST(Checker, LimitsAndPermittedValues)
 	    {"calls itself", expression("[0-9](?R)?"), "12", "Value does not match the form \"[0-9](?R)?\""},
 	    {"calls its group", expression("([0-9])(?-1)"), "12", "Value does not match the form \"([0-9])(?-1)\""},
 	    {"a bracket that may be missing", expression("\\(?1?2"), "12", ""},
+	    {"letters of a set", expression("[(?1]+2"), "12", ""},
 	    {"a group that is not counted", expression("(?:1)(?i)2"), "12", ""},
 	};
 	for (const auto& rRow : rows)

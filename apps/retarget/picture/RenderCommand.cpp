@@ -48,10 +48,9 @@ std::string ParseStrip(const std::string& i_rText, std::vector<std::size_t>& o_r
 		text.remove_prefix(std::min(colon + 1, text.size()));
 	}
 	const auto [first, last, step] = numbers;
-	const std::size_t count = step == 0 || last < first ? 0 : std::min((last - first) / step, c_MostFrames) + 1;
-	if (count == 0 || count > c_MostFrames)
+	if (step == 0 || last < first || (last - first) / step >= c_MostFrames)
 		return "\"" + i_rText + "\" makes no strip of 1 to " + std::to_string(c_MostFrames) + " frames";
-	for (std::size_t i = 0; i < count; ++i)
+	for (std::size_t i = 0; i <= (last - first) / step; ++i)
 		o_rFrames.push_back(first + i * step);
 	return {};
 }

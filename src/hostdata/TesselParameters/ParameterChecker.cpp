@@ -123,6 +123,9 @@ bool CallsItself(std::string_view i_Expression)
 	{
 		if (i_Expression[i] == '\\')
 			++i;
+		// A set of letters, whose first may be the bracket that would close it.
+		else if (i_Expression[i] == '[')
+			i = std::min(i_Expression.find(']', i + 2), i_Expression.size());
 		else if (i_Expression.substr(i, 2) == "(?")
 		{
 			std::string_view kind = i_Expression.substr(i + 2);
