@@ -230,7 +230,6 @@ TEST_F(Motion, IsPlayedJudgedAndLeavesTheDocument)
 
 	Press("TakeStop");
 	m_pOperator->WaitForDrawing();
-	m_pOperator->WaitForDrawing();
 	EXPECT_NE(m_pOperator->See(middle, 150), moved);
 	m_pOperator->ClickAt({m_pOperator->Property("scene", "width").toDouble() - 3.0, 3.0});
 	EXPECT_EVENTUALLY(selection() != selected);
@@ -246,7 +245,6 @@ TEST_F(Motion, TheViewGoesAlongWithWhatIsSelected)
 	{
 		Player().Seek(std::int64_t(i_Frame));
 		EXPECT_EVENTUALLY(Player().AtRest());
-		m_pOperator->WaitForDrawing();
 		m_pOperator->WaitForDrawing();
 		return m_pOperator->See(corner, 45);
 	};

@@ -73,6 +73,8 @@ void VOperator::WaitForDrawing() const
 	m_rPanel.quickWindow()->update();
 	EXPECT_EVENTUALLY(bDrawn);
 	QObject::disconnect(connection);
+	// What is drawn is on the screen only when the window has been put together with it, else a little later.
+	m_rPanel.repaint();
 }
 
 void VOperator::Click(const QString& i_rName, Qt::KeyboardModifiers i_Modifiers, Qt::MouseButton i_Button)

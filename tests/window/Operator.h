@@ -51,7 +51,7 @@ public:
 	/// What stands on the screen around a place of the preview.
 	QImage See(const QPointF& i_rPlace, int i_Reach) const;
 
-	/// Until the panel has been laid out and drawn once more.
+	/// Until the panel has been laid out and drawn once more, and stands so on the screen.
 	void WaitForDrawing() const;
 
 	/// The keyboard, where the focus is.
