@@ -5,6 +5,7 @@
 #include "WindowFixture.h"
 
 #include "OrlexGraphics/skins/SkinCache.h"
+#include "TesselPluginInterface/ISelectionManager.h"
 #include "studio/host/Services.h"
 #include "studio/log/LogModel.h"
 
@@ -128,6 +129,7 @@ TEST_F(Skins, OfThreeCharactersFollowADrag)
 		rOperator.Key(Qt::Key_F, Qt::ControlModifier);
 		rOperator.Wheel(rRow.m_Wheel);
 		rOperator.ClickAt({3, Middle().y()});
+		EXPECT_EVENTUALLY(m_pWindow->Context().GetSelectionManager()->Selection().Items().empty());
 		for (int row = 0; row < 2; ++row)
 		{
 			painter.drawImage(c_Width * column, row * (2 * c_Reach + 1), Settled());
