@@ -161,21 +161,22 @@ VStoreFile::~VStoreFile()
 
 void VStoreFile::Load()
 {
-	m_rSettings.beginGroup(c_Group.chopped(1));
-	const QStringList keys = m_rSettings.allKeys();
-	m_rSettings.endGroup();
+	// Of all keys: of a group QSettings does not look at what stands in the file as a group of its own within it.
+	const QStringList paths = m_rSettings.allKeys();
 	TesselDataStore::VDataWriter writer(m_pStore);
-	for (const QString& rKey : keys)
+	for (const QString& rPath : paths)
 	{
+		if (!rPath.startsWith(c_Group))
+			continue;
+		const std::string key = rPath.mid(c_Group.size()).toStdString();
 		VVariant value;
-		if (ParseValue(m_rSettings.value(c_Group + rKey).toString(), value))
+		if (ParseValue(m_rSettings.value(rPath).toString(), value))
 		{
-			writer.Set(rKey.toStdString(), value);
-			m_Keys.insert(rKey.toStdString());
+			writer.Set(key, value);
+			m_Keys.insert(key);
 		}
 		else
-			NVX_LOG("Store", NVX::ELogWarning, "The settings' entry '%1%' cannot be read and is left out",
-			    rKey.toStdString());
+			NVX_LOG("Store", NVX::ELogWarning, "The settings' entry '%1%' cannot be read and is left out", key);
 	}
 }
 
