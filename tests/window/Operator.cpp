@@ -67,6 +67,8 @@ QVariant VOperator::Property(const QString& i_rName, const char* i_pProperty) co
 
 void VOperator::WaitForDrawing() const
 {
+	// What is queued comes before it.
+	QCoreApplication::processEvents();
 	bool bDrawn = false;
 	const auto connection =
 	    QObject::connect(m_rPanel.quickWindow(), &QQuickWindow::afterRendering, [&bDrawn] { bDrawn = true; });

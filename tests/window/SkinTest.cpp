@@ -47,13 +47,19 @@ protected:
 		const QImage image = m_pOperator->See(Middle(), c_Reach);
 		return image.copy((image.width() - c_Width) / 2, 0, c_Width, image.height());
 	}
+	/// What the mouse is on is looked for in one drawing, told in the next one and seen in the third.
+	void WaitForPicking() const
+	{
+		for (int i = 0; i < 3; ++i)
+			m_pOperator->WaitForDrawing();
+	}
 	/// When what was asked for has been drawn.
 	QImage Settled() const
 	{
 		QImage seen;
 		const auto same = [&]
 		{
-			m_pOperator->WaitForDrawing();
+			WaitForPicking();
 			const QImage now = View();
 			return std::exchange(seen, now) == now;
 		};
@@ -73,7 +79,7 @@ protected:
 				if (Colour(start).saturation() < 150)
 					continue;
 				m_pOperator->Point(start);
-				m_pOperator->WaitForDrawing();
+				WaitForPicking();
 				if (std::abs(Colour(start).hue() - 60) > 10)
 					continue;
 				m_pOperator->Press(Qt::LeftButton, start);
