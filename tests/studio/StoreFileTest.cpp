@@ -9,6 +9,9 @@
 #include "studio/host/Preferences.h"
 #include "studio/host/StoreFile.h"
 
+#include <QFile>
+#include <QSettings>
+
 #include <limits>
 
 namespace
@@ -86,6 +89,19 @@ TEST_F(Store, ComesBackInTheNextRun)
 		EXPECT_EQ(scale, 2.5);
 	}
 	EXPECT_EQ(m_Settings.value("Store/RetargetSetup/Odd").toString(), "Colour red") << "another version may know it";
+}
+
+TEST_F(Store, ReadsWhatStandsAsAGroupWithinIt)
+{
+	const QString path = Path("grouped.ini");
+	QFile file(path);
+	ASSERT_TRUE(file.open(QIODevice::WriteOnly) && file.write("[Store\\RetargetSetup]\nTargetScale=Float64 2.5\n") > 0);
+	file.close();
+	QSettings settings(path, QSettings::IniFormat);
+	const StudioHost::VStoreFile store(settings, m_pStore, m_pDispatcher);
+	double scale = 0.0;
+	EXPECT_TRUE(VDataReader(m_pStore).GetFloat64("RetargetSetup/TargetScale", scale));
+	EXPECT_EQ(scale, 2.5);
 }
 
 TEST_F(Store, HoldsThePreferences)
