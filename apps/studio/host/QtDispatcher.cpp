@@ -28,3 +28,5 @@ void VQtDispatcher::Run(const std::function<void()>& i_rCallback)
 }
 
 } // namespace StudioHost
+
+#include "moc_QtDispatcher.cpp"

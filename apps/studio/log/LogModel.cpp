@@ -229,3 +229,5 @@ bool VLogFilter::filterAcceptsRow(int i_Row, const QModelIndex& i_rParent) const
 }
 
 } // namespace StudioHost
+
+#include "moc_LogModel.cpp"

@@ -134,3 +134,5 @@ void VLogPanel::UpdateCategories()
 }
 
 } // namespace StudioHost
+
+#include "moc_LogPanel.cpp"

@@ -137,3 +137,5 @@ bool VCurvePlot::eventFilter(QObject* i_pReceiver, QEvent* i_pEvent)
 }
 
 } // namespace StudioHost
+
+#include "moc_CurvePlot.cpp"

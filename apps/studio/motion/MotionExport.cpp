@@ -139,3 +139,5 @@ QString VMotionExport::Write(const VMotionExportTask& i_rTask)
 }
 
 } // namespace StudioHost
+
+#include "moc_MotionExport.cpp"

@@ -362,3 +362,5 @@ void VMotionPanel::UpdateProgress()
 }
 
 } // namespace StudioHost
+
+#include "moc_MotionPanel.cpp"

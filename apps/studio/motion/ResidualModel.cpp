@@ -182,3 +182,5 @@ QVariant VResidualModel::headerData(int i_Section, Qt::Orientation i_Orientation
 }
 
 } // namespace StudioHost
+
+#include "moc_ResidualModel.cpp"

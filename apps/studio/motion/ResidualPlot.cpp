@@ -82,3 +82,5 @@ void VResidualPlot::Draw()
 }
 
 } // namespace StudioHost
+
+#include "moc_ResidualPlot.cpp"

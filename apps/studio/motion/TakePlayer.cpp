@@ -393,3 +393,5 @@ void VTakePlayer::SetFrame(std::size_t i_Frame)
 }
 
 } // namespace StudioHost
+
+#include "moc_TakePlayer.cpp"

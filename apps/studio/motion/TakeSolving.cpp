@@ -331,3 +331,5 @@ bool VTakeSolving::BetweenFrames()
 }
 
 } // namespace StudioHost
+
+#include "moc_TakeSolving.cpp"

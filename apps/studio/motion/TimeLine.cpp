@@ -109,3 +109,5 @@ void VTimeLine::wheelEvent(QWheelEvent* i_pEvent)
 }
 
 } // namespace StudioHost
+
+#include "moc_TimeLine.cpp"

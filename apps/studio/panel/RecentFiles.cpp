@@ -59,3 +59,5 @@ void VRecentFiles::Set(QStringList i_Files)
 }
 
 } // namespace StudioHost
+
+#include "moc_RecentFiles.cpp"

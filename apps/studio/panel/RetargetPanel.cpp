@@ -589,3 +589,5 @@ void VRetargetPanel::TellUsed(const QUrl& i_rUrl)
 }
 
 } // namespace StudioHost
+
+#include "moc_RetargetPanel.cpp"

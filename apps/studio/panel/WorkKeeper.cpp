@@ -66,3 +66,5 @@ bool VWorkKeeper::Restore(const VUnsavedWork& i_rWork)
 }
 
 } // namespace StudioHost
+
+#include "moc_WorkKeeper.cpp"

@@ -88,3 +88,6 @@ VSelectionManager* SelectionManagerOf(const QQmlEngine* i_pEngine)
 }
 
 } // namespace StudioHost
+
+#include "moc_Ownership.cpp"
+#include "moc_Side.cpp"

@@ -75,3 +75,5 @@ bool VSelectionManager::IsPreSelected(const ISelectionItem& i_rItem) const
 }
 
 } // namespace StudioHost
+
+#include "moc_SelectionManager.cpp"

@@ -45,3 +45,5 @@ void VSelectionWatcher::UpdatePreSelected()
 }
 
 } // namespace StudioHost
+
+#include "moc_SelectionWatcher.cpp"

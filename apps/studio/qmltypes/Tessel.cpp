@@ -43,3 +43,5 @@ QUrl VTessel::folderUrl(const QString& i_rPath)
 }
 
 } // namespace StudioHost
+
+#include "moc_Tessel.cpp"

@@ -27,3 +27,5 @@ QObject* VTesselParameters::ParameterGroupModel(const QString& i_rPath, const QS
 }
 
 } // namespace StudioHost
+
+#include "moc_TesselParameters.cpp"

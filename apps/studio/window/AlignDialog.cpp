@@ -238,3 +238,5 @@ void VAlignDialog::done(int i_Result)
 }
 
 } // namespace StudioHost
+
+#include "moc_AlignDialog.cpp"

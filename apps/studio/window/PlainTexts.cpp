@@ -44,3 +44,5 @@ QString PlainToolTip(const QString& i_rText)
 }
 
 } // namespace StudioHost
+
+#include "moc_PlainTexts.cpp"

@@ -214,3 +214,5 @@ void VPreferencesDialog::accept()
 }
 
 } // namespace StudioHost
+
+#include "moc_PreferencesDialog.cpp"

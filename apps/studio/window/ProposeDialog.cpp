@@ -564,3 +564,5 @@ void VProposeDialog::done(int i_Result)
 }
 
 } // namespace StudioHost
+
+#include "moc_ProposeDialog.cpp"

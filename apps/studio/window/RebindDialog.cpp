@@ -88,3 +88,5 @@ void VRebindDialog::accept()
 }
 
 } // namespace StudioHost
+
+#include "moc_RebindDialog.cpp"

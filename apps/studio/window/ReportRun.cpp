@@ -110,3 +110,5 @@ void VReportRun::Tell(bool i_bEnded)
 }
 
 } // namespace StudioHost
+
+#include "moc_ReportRun.cpp"

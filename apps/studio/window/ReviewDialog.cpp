@@ -180,3 +180,5 @@ void VReviewDialog::Copy()
 }
 
 } // namespace StudioHost
+
+#include "moc_ReviewDialog.cpp"

@@ -92,3 +92,5 @@ bool VScreenshot::Save() const
 }
 
 } // namespace StudioHost
+
+#include "moc_Screenshot.cpp"

@@ -62,3 +62,5 @@ void VSkinProgress::Refresh()
 }
 
 } // namespace StudioHost
+
+#include "moc_SkinProgress.cpp"

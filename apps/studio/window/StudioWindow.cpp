@@ -344,3 +344,5 @@ void VStudioWindow::Say(const QString& i_rText)
 }
 
 } // namespace StudioHost
+
+#include "moc_StudioWindow.cpp"

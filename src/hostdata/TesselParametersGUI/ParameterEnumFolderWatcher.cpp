@@ -216,3 +216,5 @@ VParameterEnumFolderWatcher::VStamp VParameterEnumFolderWatcher::Stamp(const boo
 }
 
 } // namespace TesselParametersGUI
+
+#include "moc_ParameterEnumFolderWatcher.cpp"

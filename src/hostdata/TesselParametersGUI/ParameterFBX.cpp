@@ -19,3 +19,5 @@ std::vector<TesselPluginInterface::VEnumEntry> VParameterFBX::PermittedValues(
 }
 
 } // namespace TesselParametersGUI
+
+#include "moc_ParameterFBX.cpp"

@@ -241,3 +241,5 @@ void VParameterGroupModel::Disconnect()
 }
 
 } // namespace TesselParametersGUI
+
+#include "moc_ParameterGroupModel.cpp"

@@ -157,3 +157,5 @@ void VQuickWidget::keyPressEvent(QKeyEvent* i_pEvent)
 }
 
 } // namespace OrlexQtQuick
+
+#include "moc_QuickWidget.cpp"

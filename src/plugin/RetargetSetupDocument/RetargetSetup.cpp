@@ -110,3 +110,5 @@ bool VRetargetSetup::RestoreTargetSubjectURL(const QUrl& i_rCopyURL, const QUrl&
 		emit targetSubjectLoaded(i_rFileURL);
 	return true;
 }
+
+#include "moc_RetargetSetup.cpp"

@@ -59,3 +59,5 @@ QHash<int, QByteArray> VRetargetSetupSegmentModel::roleNames() const
 {
 	return RetargetSetup::RoleNames(QMetaEnum::fromType<ESegmentModelRoles>());
 }
+
+#include "moc_RetargetSetupSegmentModel.cpp"

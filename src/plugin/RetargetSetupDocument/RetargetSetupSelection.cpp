@@ -51,3 +51,5 @@ void VRetargetSetupSelection::Set(std::size_t i_Which, std::int32_t i_Index)
 	if (std::exchange(m_Selected[i_Which], i_Index) != i_Index)
 		emit Changed();
 }
+
+#include "moc_RetargetSetupSelection.cpp"

@@ -88,3 +88,5 @@ QHash<int, QByteArray> VRetargetSetupTargetModel::roleNames() const
 {
 	return RetargetSetup::RoleNames(QMetaEnum::fromType<ETargetModelRoles>());
 }
+
+#include "moc_RetargetSetupTargetModel.cpp"

@@ -429,3 +429,5 @@ void VRetargetSetupScene::OnManipulatorMoved(const QMatrix4x4& i_rMatrix)
 	m_pRetargetSetup->SetTargetSubjectParametrised(std::move(subject), {RetargetSetup::Steps::c_Pose, m_Drag});
 	RefreshScene();
 }
+
+#include "moc_RetargetSetupScene.cpp"

@@ -161,3 +161,5 @@ void VRetargetSetupWidget::UpdateRetargetsFolder()
 	setContextProperty(
 	    "ContextRetargetsUrl", QVariant(QUrl::fromLocalFile(QString::fromStdString(UtilsFileSystem::ToUtf8(folder)))));
 }
+
+#include "moc_RetargetSetupWidget.cpp"

@@ -242,3 +242,5 @@ void VFlowScene::SelectCamera(const QString& i_rDeviceURN, bool i_bPreselect)
 }
 
 } // namespace Flow2Graphics
+
+#include "moc_FlowScene.cpp"

@@ -127,3 +127,5 @@ void VOrlexScene::SetYUp(bool i_bYUp)
 }
 
 } // namespace OrlexGraphics
+
+#include "moc_OrlexScene.cpp"

@@ -39,3 +39,5 @@ void VCameraGrid::SetRotation(bool i_bShowRotated, bool i_bSnap90Degrees)
 }
 
 } // namespace OrlexGraphics
+
+#include "moc_CameraGrid.cpp"

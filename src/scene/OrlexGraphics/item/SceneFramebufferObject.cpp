@@ -280,3 +280,6 @@ void VSceneFramebufferObject::OnFrameChanged()
 }
 
 } // namespace OrlexGraphics
+
+#include "moc_SceneFramebufferObject.cpp"
+#include "moc_Tracking.cpp"

@@ -56,3 +56,5 @@ void VSubjectObject::SetSelectionItem(const NVX::ISelectionItem& i_rItem)
 }
 
 } // namespace OrlexGraphics
+
+#include "moc_OverlayObjects.cpp"
