@@ -9,7 +9,7 @@
 
 #include <gtest/gtest.h>
 
-#include <latch>
+#include <future>
 #include <thread>
 
 namespace
@@ -172,14 +172,14 @@ TEST_F(DataStore, AThreadMayOpenAgainWhatItHolds)
 	// A reader that outlives its writer keeps others out.
 	auto pReader = std::make_unique<VDataReader>(m_pStore);
 	pWriter.reset();
-	std::latch asked(1);
+	std::promise<void> asked;
 	std::thread other(
 	    [&]
 	    {
-		    asked.count_down();
+		    asked.set_value();
 		    VDataWriter(m_pStore).SetInt32("key", 2);
 	    });
-	asked.wait();
+	asked.get_future().wait();
 	EXPECT_TRUE(pReader->GetInt32("key", value));
 	EXPECT_EQ(value, 1);
 	pReader.reset();
@@ -192,14 +192,15 @@ TEST_F(DataStore, AThreadMayOpenAgainWhatItHolds)
 TEST_F(DataStore, ReadersAreInTogether)
 {
 	// Each waits inside for the other: if one had to stay out, this would not end.
-	std::latch inside(2);
-	const auto read = [&]
+	std::promise<void> inside[2];
+	const auto read = [&](int i_Reader)
 	{
 		const VDataReader reader(m_pStore);
-		inside.arrive_and_wait();
+		inside[i_Reader].set_value();
+		inside[1 - i_Reader].get_future().wait();
 	};
-	std::thread other(read);
-	read();
+	std::thread other(read, 1);
+	read(0);
 	other.join();
 }
 

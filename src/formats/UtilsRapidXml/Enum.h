@@ -1,9 +1,9 @@
 #pragma once
 
-#include <functional>
-#include <map>
+#include <algorithm>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 namespace UtilsRapidXml
@@ -26,27 +26,30 @@ class VEnum final : public IEnum
 public:
 	explicit VEnum(std::string i_Name) : m_Name(std::move(i_Name)) {}
 
-	VEnum& Add(T i_Value, const std::string& i_rText)
+	VEnum& Add(T i_Value, std::string i_Text)
 	{
-		m_TextToValue.emplace(i_rText, i_Value);
-		m_ValueToText.emplace(i_Value, i_rText);
+		m_Entries.emplace_back(i_Value, std::move(i_Text));
 		return *this;
 	}
 
 	bool ToValue(std::string_view i_Text, T& o_rValue) const
 	{
-		const auto it = m_TextToValue.find(i_Text);
-		if (it == m_TextToValue.end())
-			return false;
-		o_rValue = it->second;
-		return true;
+		for (const auto& [value, rText] : m_Entries)
+			if (rText == i_Text)
+			{
+				o_rValue = value;
+				return true;
+			}
+		return false;
 	}
 
 	/// Null if the value has no text. The text lives as long as the table.
 	const std::string* FindText(T i_Value) const
 	{
-		const auto it = m_ValueToText.find(i_Value);
-		return it == m_ValueToText.end() ? nullptr : &it->second;
+		for (const auto& [value, rText] : m_Entries)
+			if (value == i_Value)
+				return &rText;
+		return nullptr;
 	}
 
 	const std::string& GetName() const override { return m_Name; }
@@ -54,15 +57,16 @@ public:
 	std::vector<std::string> GetTexts() const override
 	{
 		std::vector<std::string> texts;
-		for (const auto& [rText, value] : m_TextToValue)
+		for (const auto& [value, rText] : m_Entries)
 			texts.push_back(rText);
+		std::sort(texts.begin(), texts.end());
 		return texts;
 	}
 
 private:
 	std::string m_Name;
-	std::map<std::string, T, std::less<>> m_TextToValue;
-	std::map<T, std::string> m_ValueToText;
+	/// A handful, fewer than a tree would be worth.
+	std::vector<std::pair<T, std::string>> m_Entries;
 };
 
 } // namespace UtilsRapidXml
