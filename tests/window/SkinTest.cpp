@@ -76,7 +76,8 @@ protected:
 			for (double radius = 54.0; radius > 30.0; radius -= 1.0)
 			{
 				const QPointF start = place(radius, angle);
-				if (Colour(start).saturation() < 150)
+				// Skins are darker.
+				if (const QColor colour = Colour(start); colour.saturation() < 150 || colour.value() < 250)
 					continue;
 				m_pOperator->Point(start);
 				WaitForPicking();
