@@ -58,8 +58,15 @@ TEST_P(FbxCurve, HasTheValuesComputedByHand)
 		FbxFormat::VDecodeBudget budget;
 		VFbxCurve curve;
 		ASSERT_TRUE(curve.Read(tree, tree.Find(0, "AnimationCurve"), budget));
-		for (const auto& [second, value] : GetParam().m_Values)
-			EXPECT_NEAR(curve.At(second * c_Second), value, 1e-6) << rForm.m_pName << " at " << second;
+		// From each time to each other one.
+		for (const auto& [before, valueBefore] : GetParam().m_Values)
+			for (const auto& [second, value] : GetParam().m_Values)
+			{
+				std::size_t next = 0;
+				EXPECT_NEAR(curve.At(before * c_Second, next), valueBefore, 1e-6) << rForm.m_pName << " at " << before;
+				EXPECT_NEAR(curve.At(second * c_Second, next), value, 1e-6)
+				    << rForm.m_pName << " at " << second << " after " << before;
+			}
 	}
 }
 
@@ -108,8 +115,9 @@ TEST(FbxCurve, OfOldFilesHasTheValuesComputedByHand)
 		FbxFormat::VDecodeBudget budget;
 		VFbxCurve curve;
 		ASSERT_TRUE(curve.ReadKeys(tree, tree.Find(0, "Key"), budget));
+		std::size_t next = 0;
 		for (const auto& [time, value] : values)
-			EXPECT_NEAR(curve.At(time * c_Second), value, 1e-6) << time;
+			EXPECT_NEAR(curve.At(time * c_Second, next), value, 1e-6) << time;
 	}
 	for (const char* pKeys :
 	    {"", "0", "0,0", "0,0,X", "0,0,U,z,n", "0,0,U,s,1,1", "0,0,U,s,1,1,z", "5,0,L,5,1,L", "0,nan,L", "0,1e10,L"})
@@ -155,11 +163,12 @@ TEST(FbxCurve, WeightedSlopesBendTime)
 		FbxFormat::VDecodeBudget budget;
 		VFbxCurve curve;
 		ASSERT_TRUE(curve.Read(tree, tree.Find(0, "AnimationCurve"), budget));
+		std::size_t next = 0;
 		// Here time all but stands still.
-		EXPECT_NEAR(curve.At(0.5 * c_Second), 3.0, 1e-4);
+		EXPECT_NEAR(curve.At(0.5 * c_Second, next), 3.0, 1e-4);
 		// Weights of 1: time is 3 s (1 - s)^2 + s^3, the value 0 + 6 s (1-s)^2 + 12 s^2 (1-s) + 6 s^3 at s = 0.25 is
 		// 0.4375 seconds and 0.84375 + 0.5625 + 0.09375.
-		EXPECT_NEAR(curve.At(0.4375 * c_Second), 1.5, 1e-9);
+		EXPECT_NEAR(curve.At(0.4375 * c_Second, next), 1.5, 1e-9);
 	}
 }
 

@@ -60,6 +60,7 @@ bool TakeIO::VFbxCurve::Read(const VElementTree& i_rTree, VElementIndex i_Curve,
 	    || times.size() != values.size() || flags.size() != counts.size() || data.size() != 4 * flags.size())
 		return false;
 	m_Keys.clear();
+	m_Keys.reserve(times.size());
 	for (std::size_t i = 0; i < times.size(); ++i)
 	{
 		if (!(std::abs(values[i]) <= Limits::c_Largest) || (i > 0 && times[i] <= times[i - 1]))
@@ -217,9 +218,16 @@ bool TakeIO::VFbxCurve::SetSlopes()
 	    m_Keys, [](const VKey& i_rKey) { return std::isfinite(i_rKey.m_Right) && std::isfinite(i_rKey.m_NextLeft); });
 }
 
-double TakeIO::VFbxCurve::At(double i_Time) const
+double TakeIO::VFbxCurve::At(double i_Time, std::size_t& io_rNext) const
 {
-	const auto next = std::ranges::upper_bound(m_Keys, i_Time, {}, &VKey::m_Time);
+	const auto isNext = [&](std::size_t i_Next)
+	{
+		return (i_Next == 0 || m_Keys[i_Next - 1].m_Time <= i_Time)
+		    && (i_Next == m_Keys.size() || i_Time < m_Keys[i_Next].m_Time);
+	};
+	if (!isNext(io_rNext) && (io_rNext == m_Keys.size() || !isNext(++io_rNext)))
+		io_rNext = std::size_t(std::ranges::upper_bound(m_Keys, i_Time, {}, &VKey::m_Time) - m_Keys.begin());
+	const auto next = m_Keys.begin() + std::ptrdiff_t(io_rNext);
 	if (next == m_Keys.begin())
 		return next->m_Value;
 	const VKey& rKey = next[-1];

@@ -31,7 +31,9 @@ public:
 	    const FbxFormat::VElementTree& i_rTree, FbxFormat::VElementIndex i_Keys, FbxFormat::VDecodeBudget& io_rBudget);
 
 	/// Time in ticks.
-	double At(double i_Time) const;
+	/// @param io_rNext the key behind the time, 0 before the first call and that of the last one then: times that grow
+	/// from call to call need no search.
+	double At(double i_Time, std::size_t& io_rNext) const;
 	double FirstTime() const { return m_Keys.front().m_Time; }
 	double LastTime() const { return m_Keys.back().m_Time; }
 

@@ -52,6 +52,8 @@ struct VComponent
 	double m_Value = 0.0;
 	bool m_bGiven = false;
 	std::optional<VFbxCurve> m_Curve;
+	/// Where the curve's last value came from.
+	std::size_t m_NextKey = 0;
 };
 
 /// Or a take of a file before version 7, which is no object.
@@ -397,13 +399,13 @@ private:
 	{
 		for (std::size_t i = 0; i < m_Nodes.size(); ++i)
 		{
-			const VNode& rNode = m_Nodes[i];
+			VNode& rNode = m_Nodes[i];
 			VNodeTransform transform = rNode.m_Rest;
 			VVector3* const coordinates[]{&transform.m_Translation, &transform.m_Rotation, &transform.m_Scaling};
 			const ERotationOrder order = transform.HasRotationSpace() ? transform.m_Order : ERotationOrder::XYZ;
 			for (std::size_t k = 0; k < rNode.m_Parts.size() && i_Time; ++k)
 			{
-				const VLayerPart& rPart = rNode.m_Parts[k];
+				VLayerPart& rPart = rNode.m_Parts[k];
 				const VFbxLayer& rLayer = m_Layers[rPart.m_Layer];
 				VVector3& rBefore = *coordinates[std::size_t(rPart.m_Kind)];
 				// What a layer does not tell of is as it was, or adds nothing.
@@ -412,9 +414,9 @@ private:
 					values.fill(rPart.m_Kind == EFbxCoordinates::Scaling && !rLayer.m_bAddsScaling ? 1.0 : 0.0);
 				for (std::size_t axis = 0; axis < values.size(); ++axis)
 				{
-					const VComponent& rComponent = rPart.m_Components[axis];
+					VComponent& rComponent = rPart.m_Components[axis];
 					if (rComponent.m_Curve)
-						values[axis] = rComponent.m_Curve->At(*i_Time);
+						values[axis] = rComponent.m_Curve->At(*i_Time, rComponent.m_NextKey);
 					else if (rComponent.m_bGiven && !rLayer.m_bPassesThrough)
 						values[axis] = rComponent.m_Value;
 				}
