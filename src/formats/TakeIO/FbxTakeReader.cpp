@@ -422,9 +422,8 @@ private:
 				}
 				ApplyLayer(rLayer, rPart.m_Kind, values, order, rBefore);
 			}
-			const VGlobalTransform parent =
-			    rNode.m_Parent < 0 ? VGlobalTransform() : m_Globals[std::size_t(rNode.m_Parent)];
-			m_Globals[i] = GlobalTransform(parent, LocalTransform(transform), transform.m_InheritType);
+			const VGlobalTransform& rParent = rNode.m_Parent < 0 ? m_Scene : m_Globals[std::size_t(rNode.m_Parent)];
+			m_Globals[i] = GlobalTransform(rParent, LocalTransform(transform), transform.m_InheritType);
 			if (!Place(m_Globals[i], m_Poses[i]))
 				return false;
 		}
@@ -436,14 +435,11 @@ private:
 	{
 		const EUp up = m_rTake.m_FileUp;
 		o_rPose.t = MapVector(AxisFromFile, up, m_rTake.m_FileUnit, i_rGlobal.m_Map.t);
-		for (int row = 0; row < 3; ++row)
-			for (int column = 0; column < 3; ++column)
-			{
-				const VAxis to = AxisFromFile(up, row);
-				const VAxis from = AxisFromFile(up, column);
-				o_rPose.R[3 * std::size_t(to.m_Axis) + std::size_t(from.m_Axis)] =
-				    to.m_Sign * from.m_Sign * i_rGlobal.m_Rotation[3 * std::size_t(row) + std::size_t(column)];
-			}
+		const VAxis axes[]{AxisFromFile(up, 0), AxisFromFile(up, 1), AxisFromFile(up, 2)};
+		const double* pNumber = i_rGlobal.m_Rotation.data();
+		for (const VAxis& rTo : axes)
+			for (const VAxis& rFrom : axes)
+				o_rPose.R[std::size_t(3 * rTo.m_Axis + rFrom.m_Axis)] = rTo.m_Sign * rFrom.m_Sign * *pNumber++;
 		const auto isSound = [](double i_Number) { return std::abs(i_Number) <= 1e15; };
 		return std::ranges::all_of(o_rPose.t, isSound) && std::ranges::all_of(o_rPose.R, isSound);
 	}
@@ -465,6 +461,8 @@ private:
 	double m_LastKey = -std::numeric_limits<double>::infinity();
 	double m_Start = 0.0;
 	double m_Frames = 0.0;
+	/// What the first nodes stand in.
+	const VGlobalTransform m_Scene;
 	std::vector<VGlobalTransform> m_Globals;
 	/// To the world.
 	std::vector<VJointPose> m_Poses;

@@ -8,20 +8,21 @@ namespace
 
 using namespace Rotation;
 
-/// Turning about axis 0, 1 or 2.
-VMatrix3 AxisRotation(int i_Axis, double i_Degrees)
+/// The rotation about axis 0, 1 or 2, times the matrix: a turn of two of its rows.
+void TurnRows(VMatrix3& io_rMatrix, int i_Axis, double i_Degrees)
 {
 	const double angle = i_Degrees * (std::numbers::pi / 180.0);
 	const double c = std::cos(angle);
 	const double s = std::sin(angle);
-	const int u = (i_Axis + 1) % 3;
-	const int v = (i_Axis + 2) % 3;
-	VMatrix3 matrix = c_Identity3;
-	matrix[3 * u + u] = c;
-	matrix[3 * u + v] = -s;
-	matrix[3 * v + u] = s;
-	matrix[3 * v + v] = c;
-	return matrix;
+	double* const pFirst = &io_rMatrix[3 * ((i_Axis + 1) % 3)];
+	double* const pSecond = &io_rMatrix[3 * ((i_Axis + 2) % 3)];
+	for (int column = 0; column < 3; ++column)
+	{
+		const double first = pFirst[column];
+		const double second = pSecond[column];
+		pFirst[column] = c * first - s * second;
+		pSecond[column] = s * first + c * second;
+	}
 }
 
 } // namespace
@@ -77,8 +78,9 @@ void FbxFormat::Store(const VAffine& i_rMap, fbxsdk::FbxAMatrix& o_rMatrix)
 Rotation::VMatrix3 FbxFormat::ScaledColumns(const VMatrix3& i_rMatrix, const VVector3& i_rScaling)
 {
 	VMatrix3 scaled = i_rMatrix;
-	for (int i = 0; i < 9; ++i)
-		scaled[i] *= i_rScaling[i % 3];
+	for (int row = 0; row < 9; row += 3)
+		for (int column = 0; column < 3; ++column)
+			scaled[row + column] *= i_rScaling[column];
 	return scaled;
 }
 
@@ -88,6 +90,6 @@ Rotation::VMatrix3 FbxFormat::EulerRotation(const VVector3& i_rDegrees, ERotatio
 	VMatrix3 rotation = c_Identity3;
 	for (const int axis : c_Axes[int(i_Order)])
 		if (i_rDegrees[axis] != 0.0)
-			rotation = Rotation::Product(AxisRotation(axis, i_rDegrees[axis]), rotation);
+			TurnRows(rotation, axis, i_rDegrees[axis]);
 	return rotation;
 }

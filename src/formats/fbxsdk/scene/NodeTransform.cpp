@@ -51,6 +51,8 @@ FbxFormat::VGlobalTransform FbxFormat::GlobalTransform(
 	case EInheritType::Rrs: global.m_Inherited = i_rParent.m_Inherited; break;
 	}
 	global.m_Map.L = Rotation::Product(global.m_Rotation, ScaledColumns(global.m_Inherited, i_rLocal.m_Scaling));
-	global.m_Map.t = Product(i_rParent.m_Map, i_rLocal.m_Map).t;
+	global.m_Map.t = Rotation::Product(i_rParent.m_Map.L, i_rLocal.m_Map.t);
+	for (int i = 0; i < 3; ++i)
+		global.m_Map.t[i] += i_rParent.m_Map.t[i];
 	return global;
 }
