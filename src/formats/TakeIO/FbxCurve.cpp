@@ -264,8 +264,8 @@ bool TakeIO::VFbxCurve::SetSpans(VKeys i_Keys)
 	m_Spans.reserve(i_Keys.size());
 	for (std::size_t i = 0; i < i_Keys.size(); ++i)
 	{
-		VSpan& rSpan = m_Spans.emplace_back(i_Keys[i].m_Time, FactorsBehind(i_Keys, i));
-		if (!std::ranges::all_of(rSpan.m_Factors, [](double i_Factor) { return std::isfinite(i_Factor); }))
+		m_Spans.push_back({i_Keys[i].m_Time, FactorsBehind(i_Keys, i)});
+		if (!std::ranges::all_of(m_Spans.back().m_Factors, [](double i_Factor) { return std::isfinite(i_Factor); }))
 			return false;
 	}
 	m_Weights.clear();
