@@ -245,15 +245,11 @@ bool TakeIO::VFbxCurve::ReadKeys(const VElementTree& i_rTree, VElementIndex i_Ke
 		const char weights = letter();
 		if (weights != 'n' && weights != 'r' && weights != 'l' && weights != 'a')
 			return false;
-		const auto weight = [&](std::uint32_t i_Flag, double& o_rWeight)
-		{
-			rKey.m_Flags |= i_Flag;
-			o_rWeight = std::clamp(cursor.Next().AsReal(1.0 / 3.0), 0.0, 1.0);
-		};
+		const auto weight = [&] { return std::clamp(cursor.Next().AsReal(1.0 / 3.0), 0.0, 1.0); };
 		if (weights == 'r' || weights == 'a')
-			weight(EWeightedRight, rKey.m_Weights.m_Right);
+			rKey.m_Weights.m_Right = weight();
 		if (weights == 'l' || weights == 'a')
-			weight(EWeightedNextLeft, rKey.m_Weights.m_NextLeft);
+			rKey.m_Weights.m_NextLeft = weight();
 	}
 	return !keys.empty() && SetSpans(keys);
 }
